@@ -5,12 +5,12 @@ namespace platform {
 Image Image::fromPixels(int pixelWidth, int pixelHeight, double scale, std::vector<std::uint32_t> pixels)
 {
     pixels.resize(static_cast<std::size_t>(pixelWidth) * static_cast<std::size_t>(pixelHeight));
-    return Image(std::make_shared<Data>(Data {pixelWidth, pixelHeight, scale, std::move(pixels), {}}));
+    return Image(std::make_shared<Data>(Data{pixelWidth, pixelHeight, scale, std::move(pixels), {}}));
 }
 
 Image Image::named(std::string iconName)
 {
-    return Image(std::make_shared<Data>(Data {0, 0, 1, {}, std::move(iconName)}));
+    return Image(std::make_shared<Data>(Data{0, 0, 1, {}, std::move(iconName)}));
 }
 
 bool Image::operator==(const Image& other) const
