@@ -1,0 +1,21 @@
+#pragma once
+
+#include "platform/CloudAccount.h"
+#include "platform/CloudItems.h"
+#include "platform/DocumentContainers.h"
+#include "platform/PromisedItems.h"
+
+namespace platform {
+
+/// The cloud document service, by the roles it plays.
+class CloudDocumentService {
+public:
+    virtual ~CloudDocumentService() = default;
+
+    virtual CloudAccount& account() = 0;
+    virtual PromisedItems& promisedItems() = 0;
+    virtual DocumentContainers& containers() = 0;
+    virtual CloudItems& items() = 0;
+};
+
+} // namespace platform

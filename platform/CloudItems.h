@@ -1,0 +1,35 @@
+#pragma once
+
+#include "platform/Error.h"
+#include "platform/Url.h"
+
+#include <functional>
+#include <string>
+
+namespace platform {
+
+/// Where items of the drive lie, and the texts that name them on other devices.
+class CloudItems {
+public:
+    virtual ~CloudItems() = default;
+
+    /// Whether a URL lies in the documents area (compared name by name, after resolving links in the folders
+    /// that lead to it). Any thread.
+    virtual bool isInDocumentsArea(const Url& url) const = 0;
+    /// Whether a URL lies in the drive's trash. Any thread.
+    virtual bool isInTrash(const Url& url) const = 0;
+
+    /// The path with every symbolic link in it resolved as far as it exists. Any thread.
+    virtual Url realURL(const Url& url) const = 0;
+
+    /// Finds the document that a bookmark string from another device names. The completion is called once, on
+    /// any thread, with the URL or the error (damaged, too large, unknown account or document).
+    virtual void decodeBookmark(
+        const std::string& bookmark, std::function<void(Result<Url>)> completion) const = 0;
+
+    /// The current location of the document with a 32-bit document identifier; nothing when there is none.
+    /// Any thread.
+    virtual std::optional<Url> documentWithIdentifier(std::uint32_t identifier) const = 0;
+};
+
+} // namespace platform

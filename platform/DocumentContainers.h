@@ -1,0 +1,60 @@
+#pragma once
+
+#include "platform/Error.h"
+#include "platform/Url.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace platform {
+
+/// A kind of document that a container's apps declare.
+struct DocumentType {
+    std::string name;
+    /// Uniform type identifiers; an entry of the declaration that is no text is nothing here.
+    std::vector<std::optional<std::string>> contentTypes;
+};
+
+/// What is known of one cloud document container: an app library, or the default container (the drive's top
+/// level).
+struct DocumentContainer {
+    std::string identifier;
+    std::string localizedName;
+    std::optional<Url> documentsURL; ///< its documents folder
+    std::vector<DocumentType> documentTypes;
+    std::optional<std::string> supportedFolderLevels; ///< nothing: no depth declared
+    std::vector<std::string> owningApps; ///< application identifiers, in the service's order
+    std::optional<std::string> iconName; ///< icon of the owning app
+};
+
+/// Values of DocumentContainer::supportedFolderLevels; any other text is an unknown option.
+namespace folderLevels {
+inline constexpr std::string_view any = "any";
+inline constexpr std::string_view one = "one";
+inline constexpr std::string_view none = "none";
+} // namespace folderLevels
+
+/// The cloud document containers of the account. Any thread; descriptions are read from small local files and
+/// kept.
+class DocumentContainers {
+public:
+    virtual ~DocumentContainers() = default;
+
+    virtual std::string defaultContainerIdentifier() const = 0;
+    /// The local folder of the default container; nothing when signed out.
+    virtual std::optional<Url> defaultContainerURL() const = 0;
+
+    /// Whether a URL is the documents folder of a container.
+    virtual bool isContainerTopFolder(const Url& url) const = 0;
+
+    /// The container that holds an item; an error when the URL lies in none or the container's description is
+    /// damaged.
+    virtual Result<std::shared_ptr<const DocumentContainer>> containerForItem(const Url& url) const = 0;
+
+    /// All containers that the service knows, the default container first, then by localized name.
+    virtual std::vector<std::shared_ptr<const DocumentContainer>> allContainers() const = 0;
+};
+
+} // namespace platform

@@ -1,0 +1,39 @@
+#include "platform/Services.h"
+
+#include "platform/Application.h"
+#include "platform/CloudDocumentService.h"
+#include "platform/Dispatch.h"
+#include "platform/FileCoordinator.h"
+#include "platform/FileSystem.h"
+#include "platform/FolderLister.h"
+#include "platform/Formatters.h"
+#include "platform/Localization.h"
+#include "platform/NotificationCenter.h"
+#include "platform/PreviewSupport.h"
+#include "platform/StorageOffers.h"
+#include "platform/TypeRegistry.h"
+#include "platform/UserDefaults.h"
+
+namespace platform {
+
+namespace {
+
+Services& installed()
+{
+    static Services instance{ServiceSet{}};
+    return instance;
+}
+
+} // namespace
+
+const Services& services()
+{
+    return installed();
+}
+
+void installServices(ServiceSet set)
+{
+    installed() = Services(std::move(set));
+}
+
+} // namespace platform

@@ -1,0 +1,68 @@
+#pragma once
+
+#include <memory>
+
+namespace platform {
+
+class CloudDocumentService;
+class Dispatch;
+class FileCoordinator;
+class FileSystem;
+class FolderLister;
+class Formatters;
+class KeyedArchiver;
+class Localization;
+class NotificationCenter;
+class PreviewSupport;
+class StorageOfferManager;
+class TypeRegistry;
+class UserDefaults;
+
+/// The installed platform services. A service that is not installed is null; main installs all of them.
+struct ServiceSet {
+    std::shared_ptr<CloudDocumentService> cloudDocumentService;
+    std::shared_ptr<Dispatch> dispatch;
+    std::shared_ptr<FileCoordinator> fileCoordinator;
+    std::shared_ptr<FileSystem> fileSystem;
+    std::shared_ptr<FolderLister> folderLister;
+    std::shared_ptr<Formatters> formatters;
+    std::shared_ptr<KeyedArchiver> keyedArchiver;
+    std::shared_ptr<Localization> localization;
+    std::shared_ptr<NotificationCenter> notificationCenter;
+    std::shared_ptr<PreviewSupport> previewSupport;
+    std::shared_ptr<StorageOfferManager> storageOfferManager;
+    std::shared_ptr<TypeRegistry> typeRegistry;
+    std::shared_ptr<UserDefaults> userDefaults;
+};
+
+/// Access to the installed services. The references stay valid until the next installServices().
+class Services {
+public:
+    explicit Services(ServiceSet set)
+        : _set(std::move(set))
+    {
+    }
+
+    CloudDocumentService& cloudDocumentService() const { return *_set.cloudDocumentService; }
+    Dispatch& dispatch() const { return *_set.dispatch; }
+    FileCoordinator& fileCoordinator() const { return *_set.fileCoordinator; }
+    FileSystem& fileSystem() const { return *_set.fileSystem; }
+    FolderLister& folderLister() const { return *_set.folderLister; }
+    Formatters& formatters() const { return *_set.formatters; }
+    KeyedArchiver& keyedArchiver() const { return *_set.keyedArchiver; }
+    Localization& localization() const { return *_set.localization; }
+    NotificationCenter& notificationCenter() const { return *_set.notificationCenter; }
+    PreviewSupport& previewSupport() const { return *_set.previewSupport; }
+    StorageOfferManager& storageOfferManager() const { return *_set.storageOfferManager; }
+    TypeRegistry& typeRegistry() const { return *_set.typeRegistry; }
+    UserDefaults& userDefaults() const { return *_set.userDefaults; }
+
+private:
+    ServiceSet _set;
+};
+
+/// The installed set. Install before use; main does so once, a test fixture for each test.
+const Services& services();
+void installServices(ServiceSet set);
+
+} // namespace platform

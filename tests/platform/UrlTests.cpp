@@ -1,0 +1,76 @@
+#include "platform/Url.h"
+
+#include <gtest/gtest.h>
+
+using platform::PathKind;
+using platform::percentDecoded;
+using platform::Url;
+
+namespace {
+
+TEST(Url, ParsesSchemePathAndQuery)
+{
+    const auto url = Url::parse("tarrowdriveapp://host/path/to%20a/D%25oc.txt?mode=details&a%20b=%26&flag");
+    ASSERT_TRUE(url);
+    EXPECT_EQ(url->scheme(), "tarrowdriveapp");
+    EXPECT_EQ(url->host(), "host");
+    EXPECT_EQ(url->path(), "/path/to a/D%oc.txt");
+    ASSERT_EQ(url->queryItems().size(), 3U);
+    EXPECT_EQ(url->queryItems()[0].value, "details");
+    EXPECT_EQ(url->queryItems()[1].name, "a b");
+    EXPECT_EQ(url->queryItems()[1].value, "&");
+    EXPECT_FALSE(url->queryItems()[2].value);
+}
+
+TEST(Url, RefusesWhatCannotBeALocation)
+{
+    for (const std::string text : {"", "no-scheme", "://x", "1a:/x", "s:/a b", "s:/a\nb", "s:/%", "s:/%4",
+             "s:/%zz", "s:/%00", "s:/a%2fb", "s:/a%2Fb", "s:/%ff", "s:/%c0%ae", "s:/x?a=%", "file:relative"})
+        EXPECT_FALSE(Url::parse(text)) << text;
+    EXPECT_FALSE(Url::parse("s:/" + std::string(Url::maximumLength, 'a')));
+}
+
+TEST(Url, KeepsAFilesBytesThroughItsText)
+{
+    for (const std::string path : {"/a/b c%20d", "/caf\xc3\xa9", "/bad\xff\xfe", "/q?x#y", "/-x'\"&"}) {
+        const auto url = Url::fileURL(path);
+        const auto again = Url::parse(url.absoluteString());
+        ASSERT_TRUE(again) << path;
+        EXPECT_EQ(again->path(), path);
+        EXPECT_EQ(*again, url);
+        EXPECT_FALSE(again->isSameObject(url));
+    }
+}
+
+TEST(Url, SplitsAndJoinsNames)
+{
+    const auto folder = Url::fileURL("//a//b/", PathKind::Directory);
+    EXPECT_EQ(folder.path(), "/a/b");
+    EXPECT_EQ(folder.absoluteString(), "file:///a/b/");
+    EXPECT_EQ(folder.appendingPathComponent("c.tar.gz").path(), "/a/b/c.tar.gz");
+    EXPECT_EQ(folder.deletingLastPathComponent().deletingLastPathComponent().path(), "/");
+    EXPECT_EQ(Url::fileURL("/").deletingLastPathComponent().path(), "/");
+    const std::pair<const char*, const char*> extensions[] = {{"/x/c.tar.gz", "gz"}, {"/x/.hidden", ""},
+        {"/x/.hidden.txt", "txt"}, {"/x.d/none", ""}, {"/x/a.b c", ""}};
+    for (const auto& [path, extension] : extensions)
+        EXPECT_EQ(Url::fileURL(path).pathExtension(), extension) << path;
+}
+
+TEST(Url, ComparesPlacesNameByName)
+{
+    const auto root = Url::fileURL("/drive/Documents");
+    EXPECT_TRUE(root.isWithin(root));
+    EXPECT_TRUE(Url::fileURL("/drive/Documents/a").isWithin(root));
+    EXPECT_FALSE(Url::fileURL("/drive/Documents-evil/a").isWithin(root));
+    EXPECT_FALSE(Url::fileURL("/drive").isWithin(root));
+    EXPECT_TRUE(Url::fileURL("/a").isWithin(Url::fileURL("/")));
+}
+
+TEST(Url, DecodesOncePerCall)
+{
+    EXPECT_EQ(percentDecoded("a%2520b"), "a%20b");
+    EXPECT_EQ(percentDecoded("a%20b"), "a b");
+    EXPECT_FALSE(percentDecoded("100%"));
+}
+
+} // namespace

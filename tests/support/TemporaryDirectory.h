@@ -1,0 +1,27 @@
+#pragma once
+
+#include <filesystem>
+#include <string>
+#include <string_view>
+
+namespace testing_support {
+
+/// A folder of its own for one test, removed with everything in it at the end.
+class TemporaryDirectory {
+public:
+    TemporaryDirectory();
+    ~TemporaryDirectory();
+    TemporaryDirectory(const TemporaryDirectory&) = delete;
+    TemporaryDirectory& operator=(const TemporaryDirectory&) = delete;
+
+    const std::filesystem::path& path() const { return _path; }
+    /// The path of something below the folder.
+    std::string at(std::string_view name) const { return (_path / name).string(); }
+    /// Writes a file below the folder, making the folders that lead to it; answers its path.
+    std::string write(std::string_view name, std::string_view content) const;
+
+private:
+    std::filesystem::path _path;
+};
+
+} // namespace testing_support

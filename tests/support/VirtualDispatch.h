@@ -1,0 +1,56 @@
+#pragma once
+
+#include "platform/Dispatch.h"
+
+#include <cstdint>
+#include <mutex>
+#include <string>
+#include <thread>
+#include <vector>
+
+namespace testing_support {
+
+/// Queues and timers on a clock that only the test moves. Work of every queue runs on the thread that drives
+/// it, in the order of due times and, within one moment, of submission. Work may be added from any thread.
+class VirtualDispatch : public platform::Dispatch, public std::enable_shared_from_this<VirtualDispatch> {
+public:
+    static std::shared_ptr<VirtualDispatch> create() { return std::make_shared<VirtualDispatch>(); }
+
+    std::shared_ptr<platform::Queue> mainQueue() override;
+    bool isMainThread() const override { return std::this_thread::get_id() == _owner; }
+    std::shared_ptr<platform::Queue> makeSerialQueue(std::string label) override;
+    std::shared_ptr<platform::OperationQueue> makeOperationQueue(
+        std::string name, platform::QualityOfService quality) override;
+    void after(platform::Duration delay, const std::shared_ptr<platform::Queue>& queue,
+        platform::Work work) override;
+    std::unique_ptr<platform::Timer> startTimer(const std::shared_ptr<platform::Queue>& queue,
+        platform::Duration period, platform::Duration leeway, platform::Work handler) override;
+    platform::Date now() const override;
+
+    /// Runs what is due now, and what that adds for now, until nothing is left.
+    void runUntilIdle();
+    /// Moves the clock by seconds, running what falls due on the way at its own time.
+    void advance(double seconds);
+    /// How many pieces of work wait, timers included.
+    std::size_t pendingCount() const;
+
+    void submit(platform::Duration delay, platform::Work work);
+
+private:
+    struct Pending {
+        std::int64_t due;
+        std::uint64_t order;
+        platform::Work work;
+    };
+    bool runNext(std::int64_t limit);
+
+    mutable std::mutex _mutex;
+    std::vector<Pending> _pending;
+    std::int64_t _now =
+        1'700'000'000'000'000'000; // a fixed moment of 2023, so that texts with dates do not change
+    std::uint64_t _nextOrder = 0;
+    std::thread::id _owner = std::this_thread::get_id();
+    std::weak_ptr<platform::Queue> _mainQueue;
+};
+
+} // namespace testing_support
