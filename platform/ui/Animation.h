@@ -1,0 +1,27 @@
+#pragma once
+
+#include <functional>
+
+namespace platform::ui {
+
+/// The platform's curves, with the numbers that keyboard notices carry.
+enum class AnimationCurve { EaseInOut = 0, EaseIn = 1, EaseOut = 2, Linear = 3 };
+
+struct AnimationOptions {
+    double duration = 0.25; ///< seconds
+    double delay = 0; ///< seconds
+    AnimationCurve curve = AnimationCurve::EaseInOut;
+    bool laysOutSubviews = false;
+    bool beginsFromCurrentState = false;
+};
+
+/// Runs changes that a host may show as a movement. The model changes at once, `completion` is called right
+/// after. While `changes` runs, `currentAnimation()` answers the options to the peers that are told of the
+/// changes. Main thread only.
+void animate(const AnimationOptions& options, const std::function<void()>& changes,
+    const std::function<void()>& completion = {});
+
+/// Null outside of `animate`.
+const AnimationOptions* currentAnimation();
+
+} // namespace platform::ui

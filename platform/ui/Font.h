@@ -1,0 +1,50 @@
+#pragma once
+
+namespace platform::ui {
+
+enum class TextStyle {
+    LargeTitle,
+    Title1,
+    Title2,
+    Title3,
+    Headline,
+    Subheadline,
+    Body,
+    Callout,
+    Footnote,
+    Caption1,
+    Caption2,
+};
+
+enum class FontWeight { Regular, Bold };
+
+/// Whether a font grows and shrinks with the user's text-size setting.
+enum class TextSizing { FollowsSetting, Fixed };
+
+/// Lengths of a font in points, measured from the baseline; what hangs below it is negative.
+struct FontMetrics {
+    double ascender = 0, descender = 0, capHeight = 0, lineHeight = 0;
+};
+
+/// A font, named by the role that its text plays.
+struct Font {
+    TextStyle style = TextStyle::Body;
+    double pointSize = 17; ///< at the default text size
+    FontWeight weight = FontWeight::Regular;
+    TextSizing sizing = TextSizing::FollowsSetting;
+
+    /// The role's font in its standard size and weight.
+    static Font preferred(TextStyle style);
+    static Font preferred(TextStyle style, double pointSize);
+
+    Font bold() const;
+    Font fixed() const;
+
+    /// As the installed text measurer has it.
+    FontMetrics metrics() const;
+    double lineHeight() const { return metrics().lineHeight; }
+
+    bool operator==(const Font&) const = default;
+};
+
+} // namespace platform::ui

@@ -1,0 +1,67 @@
+#pragma once
+
+#include <memory>
+
+namespace platform::ui {
+
+class LayoutConstraint;
+class View;
+
+enum class LayoutAttribute {
+    None,
+    Left,
+    Right,
+    Top,
+    Bottom,
+    Leading, ///< left in a left-to-right layout, right in a right-to-left one
+    Trailing,
+    Width,
+    Height,
+    CenterX,
+    CenterY,
+    FirstBaseline,
+    LastBaseline,
+};
+
+enum class LayoutRelation { LessThanOrEqual, Equal, GreaterThanOrEqual };
+
+/// Priorities of constraints, 1 to 1000. A higher one is satisfied before any lower one is looked at.
+using LayoutPriority = float;
+
+namespace LayoutPriorities {
+
+inline constexpr LayoutPriority required = 1000;
+inline constexpr LayoutPriority defaultHigh = 750; ///< resistance against being made smaller than the content
+inline constexpr LayoutPriority defaultLow = 250; ///< hugging: resistance against being made larger
+inline constexpr LayoutPriority fittingSize =
+    50; ///< the pull to the smallest size when a fitting size is asked
+
+} // namespace LayoutPriorities
+
+/// One edge, centre line, dimension or baseline of a view. Its builders answer a new constraint that is not
+/// active yet: this anchor = (other anchor * multiplier) + constant.
+class LayoutAnchor {
+public:
+    LayoutAnchor() = default;
+    LayoutAnchor(std::weak_ptr<View> view, LayoutAttribute attribute);
+
+    std::shared_ptr<View> view() const { return _view.lock(); }
+    LayoutAttribute attribute() const { return _attribute; }
+    bool isNone() const { return _attribute == LayoutAttribute::None; }
+
+    using Made = std::shared_ptr<LayoutConstraint>;
+    Made equalTo(const LayoutAnchor& other, double constant = 0, double multiplier = 1) const;
+    Made lessThanOrEqualTo(const LayoutAnchor& other, double constant = 0, double multiplier = 1) const;
+    Made greaterThanOrEqualTo(const LayoutAnchor& other, double constant = 0, double multiplier = 1) const;
+
+    /// For widths and heights: a plain number of points.
+    Made equalToConstant(double constant) const;
+    Made lessThanOrEqualToConstant(double constant) const;
+    Made greaterThanOrEqualToConstant(double constant) const;
+
+private:
+    std::weak_ptr<View> _view;
+    LayoutAttribute _attribute = LayoutAttribute::None;
+};
+
+} // namespace platform::ui

@@ -1,0 +1,57 @@
+#pragma once
+
+#include "platform/ui/LayoutAnchor.h"
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <span>
+
+namespace platform::ui {
+
+/// Solves systems of linear equations and inequalities over real numbers, incrementally, by the Cassowary
+/// method (a simplex tableau that is kept solved). Constraints that are not required may be missed; what is
+/// missed is least by priority: a constraint is never given up for any number of constraints of lower
+/// priorities, and among equals the sum of the misses is least. It knows nothing of views. Variables may be
+/// negative.
+class LayoutSolver {
+public:
+    using Variable = std::uint32_t;
+    using ConstraintId = std::uint32_t;
+
+    struct Term {
+        Variable variable;
+        double coefficient;
+    };
+
+    LayoutSolver();
+    ~LayoutSolver();
+    LayoutSolver(LayoutSolver&&) noexcept;
+    LayoutSolver& operator=(LayoutSolver&&) noexcept;
+
+    /// A variable that no constraint names is 0.
+    Variable addVariable();
+    /// The variable may be handed out again. Its constraints have to be removed first.
+    void removeVariable(Variable variable);
+
+    /// Adds: sum of terms (relation) constant. Nothing, and an unchanged system, when the constraint is
+    /// required and contradicts what is required already.
+    std::optional<ConstraintId> addConstraint(
+        std::span<const Term> terms, LayoutRelation relation, double constant, LayoutPriority priority);
+    void removeConstraint(ConstraintId id);
+    /// False when the constraint is required and the new constant contradicts what is required: the
+    /// constraint is then removed, as `removeConstraint` does.
+    bool setConstant(ConstraintId id, double constant);
+
+    /// Wishes a value for a variable; suggesting another one later is cheap. The priority is below 1000.
+    ConstraintId addEdit(Variable variable, LayoutPriority priority);
+    void suggest(ConstraintId edit, double value) { setConstant(edit, value); }
+
+    double value(Variable variable) const;
+
+private:
+    class Tableau;
+    std::unique_ptr<Tableau> _tableau;
+};
+
+} // namespace platform::ui

@@ -1,0 +1,39 @@
+#pragma once
+
+#include "platform/Color.h"
+#include "platform/Image.h"
+
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace platform::ui {
+
+/// Names a row for as long as its list lives, wherever it stands.
+using RowId = std::uint64_t;
+
+enum class RowKind { Item, SectionHeader };
+enum class RowAccessory { None, Disclosure };
+enum class CheckState { None, Off, On };
+enum class DownloadState { Present, InCloud, Downloading };
+
+/// Everything that one row of a list shows. A value: made when a row is about to be seen, gone afterwards.
+struct ListRow {
+    RowId id = 0;
+    RowKind kind = RowKind::Item;
+    std::optional<Image> image;
+    std::string title;
+    std::string detail; ///< second line; empty: none
+    RowAccessory accessory = RowAccessory::None;
+    CheckState check = CheckState::None; ///< the list sets it by its selection
+    std::vector<Color> tagColors; ///< dots beside the title, in this order
+    DownloadState download = DownloadState::Present;
+    double downloadProgress = 0; ///< 0 to 1, while Downloading
+    bool isDimmed = false;
+    std::string accessibleDescription; ///< empty: title and detail
+
+    bool operator==(const ListRow&) const = default;
+};
+
+} // namespace platform::ui

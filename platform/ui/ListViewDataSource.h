@@ -1,0 +1,23 @@
+#pragma once
+
+#include "platform/ui/ListChanges.h"
+
+namespace platform::ui {
+
+class ListView;
+
+/// Answers what a list shows. Asked on the main thread, only for rows that are about to be seen, so an answer
+/// must come from memory: what takes longer is fetched after `visibleRowsDidChange` and told with
+/// `rowChanged`.
+class ListViewDataSource {
+public:
+    virtual ~ListViewDataSource() = default;
+
+    virtual std::size_t numberOfRows(const ListView& list) const = 0;
+    /// `index` is below the number of rows.
+    virtual ListRow rowAtIndex(const ListView& list, std::size_t index) const = 0;
+    /// The same identifier that `rowAtIndex` answers, without making the row.
+    virtual RowId rowIdAtIndex(const ListView& list, std::size_t index) const = 0;
+};
+
+} // namespace platform::ui

@@ -1,0 +1,26 @@
+#pragma once
+
+#include <memory>
+
+namespace platform::ui {
+
+class NavigationController;
+class ViewController;
+
+/// Is told which screen a navigation controller shows. Main thread only.
+class NavigationControllerDelegate {
+public:
+    virtual ~NavigationControllerDelegate() = default;
+
+    virtual void navigationControllerWillShowViewControllerAnimated(
+        NavigationController&, const std::shared_ptr<ViewController>& /*screen*/, bool /*animated*/)
+    {
+    }
+    /// After the movement, also of a screen that the user went back to.
+    virtual void navigationControllerDidShowViewControllerAnimated(
+        NavigationController&, const std::shared_ptr<ViewController>& /*screen*/, bool /*animated*/)
+    {
+    }
+};
+
+} // namespace platform::ui

@@ -1,0 +1,45 @@
+#pragma once
+
+#include "platform/ui/BarButtonItem.h"
+
+#include <functional>
+
+namespace platform::ui {
+
+/// What a screen shows in the navigation bar while it is on top.
+class NavigationItem {
+public:
+    /// `onChange` is called after every change.
+    explicit NavigationItem(std::function<void()> onChange);
+
+    const std::string& title() const { return _title; }
+    void setTitle(std::string title);
+    const std::string& subtitle() const { return _subtitle; } ///< empty: none
+    void setSubtitle(std::string subtitle);
+
+    const BarButtonItems& leftItems() const { return _leftItems; }
+    void setLeftItems(BarButtonItems items);
+    /// The first one stands at the right edge, the others go on to the left.
+    const BarButtonItems& rightItems() const { return _rightItems; }
+    void setRightItems(BarButtonItems items);
+    void setRightItem(std::shared_ptr<BarButtonItem> item); ///< null: none
+
+    bool hidesBackButton() const { return _hidesBackButton; }
+    void setHidesBackButton(bool hides);
+    /// Whether left items stand beside the back button instead of replacing it.
+    bool leftItemsSupplementBackButton() const { return _leftItemsSupplementBackButton; }
+    void setLeftItemsSupplementBackButton(bool supplement);
+
+    /// What the bar's search button does; absent: no such button.
+    const std::function<void()>& searchAction() const { return _searchAction; }
+    void setSearchAction(std::function<void()> action);
+
+private:
+    std::function<void()> _onChange;
+    std::string _title, _subtitle;
+    BarButtonItems _leftItems, _rightItems;
+    bool _hidesBackButton = false, _leftItemsSupplementBackButton = false;
+    std::function<void()> _searchAction;
+};
+
+} // namespace platform::ui

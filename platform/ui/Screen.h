@@ -1,0 +1,36 @@
+#pragma once
+
+#include "platform/Geometry.h"
+
+#include <optional>
+
+namespace platform::ui {
+
+enum class UserInterfaceIdiom { Phone, Tablet };
+
+/// How the interface is held, with the numbers that layout rules use.
+enum class InterfaceOrientation {
+    Portrait = 1,
+    PortraitUpsideDown = 2,
+    LandscapeLeft = 3,
+    LandscapeRight = 4,
+};
+
+/// What is known of the display that shows the application.
+struct Screen {
+    Rect bounds; ///< points
+    double scale = 1; ///< device pixels to a point
+    UserInterfaceIdiom idiom = UserInterfaceIdiom::Phone;
+    Rect statusBarFrame; ///< the strip at the top that the system draws into; zero when there is none
+
+    /// The main screen; nothing on a machine without a display. Main thread only.
+    static const std::optional<Screen>& main();
+    static void setMain(std::optional<Screen> screen);
+
+    /// Device pixels to a point on the main screen, 1 without one.
+    static double mainScale();
+
+    bool operator==(const Screen&) const = default;
+};
+
+} // namespace platform::ui

@@ -1,0 +1,25 @@
+#pragma once
+
+namespace platform::ui {
+
+enum class SizeClass { Compact, Regular };
+enum class LayoutDirection { LeftToRight, RightToLeft };
+enum class ColorScheme { Light, Dark };
+
+/// The surroundings that a view adapts to.
+struct TraitCollection {
+    SizeClass horizontalSizeClass = SizeClass::Compact;
+    SizeClass verticalSizeClass = SizeClass::Regular;
+    LayoutDirection layoutDirection = LayoutDirection::LeftToRight;
+    ColorScheme colorScheme = ColorScheme::Light;
+
+    bool isRightToLeft() const { return layoutDirection == LayoutDirection::RightToLeft; }
+
+    /// The application's traits: what holds for every view that stands in no window. Main thread only.
+    static const TraitCollection& application();
+    static void setApplication(const TraitCollection& traits);
+
+    bool operator==(const TraitCollection&) const = default;
+};
+
+} // namespace platform::ui

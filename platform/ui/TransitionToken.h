@@ -1,0 +1,26 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+
+namespace platform::ui {
+
+/// What a peer holds while it shows a transition. The model has changed already; what has to wait for the end
+/// of the movement runs once, when `finish()` is called or when the last copy of the token is destroyed, so
+/// that a peer that dies in the middle loses nothing. Main thread only.
+class TransitionToken {
+public:
+    /// A token that is finished already.
+    TransitionToken() = default;
+    explicit TransitionToken(std::function<void()> atEnd);
+
+    /// Runs what waits. Later calls do nothing.
+    void finish() const;
+    bool isFinished() const;
+
+private:
+    struct State;
+    std::shared_ptr<State> _state;
+};
+
+} // namespace platform::ui

@@ -1,0 +1,15 @@
+#pragma once
+
+namespace platform::ui {
+
+class ViewController;
+
+/// Call down: what surrounds a screen has changed.
+class ViewControllerObserver {
+public:
+    virtual ~ViewControllerObserver() = default;
+    /// The title, the navigation item or the toolbar items. May come several times for one change.
+    virtual void barsDidChange(ViewController& controller) = 0;
+};
+
+} // namespace platform::ui

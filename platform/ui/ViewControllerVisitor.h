@@ -1,0 +1,21 @@
+#pragma once
+
+namespace platform::ui {
+
+class AlertController;
+class NavigationController;
+class SearchPresentation;
+class ViewController;
+
+/// Tells the kinds of screen apart without casts.
+class ViewControllerVisitor {
+public:
+    virtual ~ViewControllerVisitor() = default;
+
+    virtual void visit(ViewController& controller) = 0;
+    virtual void visit(NavigationController& controller) = 0;
+    virtual void visit(AlertController& controller) = 0;
+    virtual void visit(SearchPresentation& controller) = 0;
+};
+
+} // namespace platform::ui

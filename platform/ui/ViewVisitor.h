@@ -1,0 +1,32 @@
+#pragma once
+
+namespace platform::ui {
+
+class ActivityIndicator;
+class Button;
+class HostedView;
+class ImageView;
+class Label;
+class ListView;
+class ScrollView;
+class TextField;
+class View;
+
+/// Tells the kinds of view apart without casts: `view.accept(visitor)` calls the operation of the nearest
+/// kind. A view of one's own that derives from a kind is visited as that kind; stack views are plain views.
+class ViewVisitor {
+public:
+    virtual ~ViewVisitor() = default;
+
+    virtual void visit(View& view) = 0;
+    virtual void visit(Label& label) = 0;
+    virtual void visit(ImageView& imageView) = 0;
+    virtual void visit(Button& button) = 0;
+    virtual void visit(TextField& textField) = 0;
+    virtual void visit(ScrollView& scrollView) = 0;
+    virtual void visit(ListView& listView) = 0;
+    virtual void visit(ActivityIndicator& indicator) = 0;
+    virtual void visit(HostedView& hostedView) = 0;
+};
+
+} // namespace platform::ui

@@ -1,0 +1,21 @@
+#pragma once
+
+#include <memory>
+
+namespace platform::ui {
+
+class Window;
+
+/// The service that shows windows. Without one the kit works on the model alone. Main thread only.
+class WindowHost {
+public:
+    virtual ~WindowHost() = default;
+
+    /// A window wants to be seen: make a peer for it, attach it with `Window::setObserver`, report the size.
+    virtual void showWindow(const std::shared_ptr<Window>& window) = 0;
+
+    static std::shared_ptr<WindowHost> current();
+    static void install(std::shared_ptr<WindowHost> host); ///< null: none
+};
+
+} // namespace platform::ui
