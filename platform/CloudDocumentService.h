@@ -4,6 +4,7 @@
 #include "platform/CloudItems.h"
 #include "platform/DocumentContainers.h"
 #include "platform/PromisedItems.h"
+#include "platform/SecurityScopedAccess.h"
 
 namespace platform {
 
@@ -16,6 +17,7 @@ public:
     virtual PromisedItems& promisedItems() = 0;
     virtual DocumentContainers& containers() = 0;
     virtual CloudItems& items() = 0;
+    virtual SecurityScopedAccess& securityScopedAccess() = 0;
 };
 
 } // namespace platform

@@ -53,6 +53,22 @@ public:
     /// damaged.
     virtual Result<std::shared_ptr<const DocumentContainer>> containerForItem(const Url& url) const = 0;
 
+    /// The container that the names of a URL say it belongs to, known or not; nothing when they say none. No
+    /// file is read.
+    virtual std::optional<std::string> containerIdentifierInURL(const Url& url) const = 0;
+    /// The container with an identifier; null when the service knows none.
+    virtual std::shared_ptr<const DocumentContainer> containerWithIdentifier(
+        const std::string& identifier) const = 0;
+
+    /// The path of a URL below the root of all cloud documents, such as "BrindleDefault/Documents/Notes.txt"
+    /// (empty for the root itself); nothing when the URL lies outside.
+    virtual std::optional<std::string> pathRelativeToSyncedRoot(const Url& url) const = 0;
+
+    /// Whether files of one container can be moved to another as they are, without fetching what is only
+    /// promised.
+    virtual bool canMoveWithoutDownloading(
+        const DocumentContainer& source, const DocumentContainer& destination) const = 0;
+
     /// All containers that the service knows, the default container first, then by localized name.
     virtual std::vector<std::shared_ptr<const DocumentContainer>> allContainers() const = 0;
 };

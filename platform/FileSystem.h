@@ -30,6 +30,9 @@ public:
     /// Whether something is at the path, links followed, and what: nothing there answers no value.
     virtual std::optional<FileType> typeOfItem(const std::string& path) const = 0;
 
+    /// The user's own documents folder, outside the drive; nothing when none is set up.
+    virtual std::optional<Url> userDocumentsFolder() const = 0;
+
     /// How an enumeration goes on after an entry or an error.
     enum class Continue { Yes, No };
     /// Calls `entry` for everything below a folder, at all levels, hidden files and packages' contents

@@ -1,6 +1,7 @@
 #include "platform/Services.h"
 
 #include "platform/Application.h"
+#include "platform/CharacterData.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
 #include "platform/FileCoordinator.h"

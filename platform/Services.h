@@ -4,6 +4,7 @@
 
 namespace platform {
 
+class CharacterData;
 class CloudDocumentService;
 class Dispatch;
 class FileCoordinator;
@@ -20,6 +21,7 @@ class UserDefaults;
 
 /// The installed platform services. A service that is not installed is null; main installs all of them.
 struct ServiceSet {
+    std::shared_ptr<CharacterData> characterData;
     std::shared_ptr<CloudDocumentService> cloudDocumentService;
     std::shared_ptr<Dispatch> dispatch;
     std::shared_ptr<FileCoordinator> fileCoordinator;
@@ -43,6 +45,7 @@ public:
     {
     }
 
+    CharacterData& characterData() const { return *_set.characterData; }
     CloudDocumentService& cloudDocumentService() const { return *_set.cloudDocumentService; }
     Dispatch& dispatch() const { return *_set.dispatch; }
     FileCoordinator& fileCoordinator() const { return *_set.fileCoordinator; }
