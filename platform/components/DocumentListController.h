@@ -1,0 +1,123 @@
+#pragma once
+
+#include "platform/Url.h"
+#include "platform/components/DocumentListAction.h"
+#include "platform/components/DocumentListControllerDelegate.h"
+#include "platform/ui/ListViewDelegate.h"
+#include "platform/ui/ViewController.h"
+
+#include <map>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace platform::ui {
+class ListView;
+} // namespace platform::ui
+
+namespace platform::components {
+
+class DocumentRowSource;
+class DocumentSearch;
+class FolderContents;
+class PlaceholderView;
+struct FolderContentsUpdate;
+
+/// The screen that shows one folder of the drive. It begins to list the folder when its view is loaded and
+/// follows every change from then on. Main thread only; nothing that could wait is done there.
+class DocumentListController : public ui::ViewController, private ui::ListViewDelegate {
+public:
+    /// The list of the drive's top level, which shows the app libraries as well; null when there is no
+    /// default container (signed out).
+    static std::shared_ptr<DocumentListController> createRootList();
+    static std::shared_ptr<DocumentListController> initWithURL(const Url& url);
+    /// The lists from the drive's top level down to a folder, in this order, each of its own; empty when the
+    /// folder does not lie in the default container or in an app library.
+    static std::vector<std::shared_ptr<DocumentListController>> hierarchyForURL(const Url& url);
+
+    /// For derived lists; without a folder the list stays empty.
+    explicit DocumentListController(std::optional<Url> folder);
+    ~DocumentListController() override;
+
+    void setDelegate(std::weak_ptr<DocumentListControllerDelegate> delegate);
+    std::shared_ptr<DocumentListControllerDelegate> delegate() const { return _delegate.lock(); }
+
+    const std::optional<Url>& presentedURL() const { return _presentedURL; }
+    /// Makes a URL for every item: for 100,000 items that is a lot; ask for the count where that is enough.
+    std::vector<Url> containedItems() const;
+    /// The number of items listed so far.
+    std::size_t containedItemCount() const;
+
+    /// In the order of the list.
+    std::vector<Url> selectedItems() const;
+    std::size_t selectedItemCount() const;
+    /// URLs that are no items of the list are ignored. Only an editing list selects.
+    void setSelectedItems(const std::vector<Url>& items);
+
+    bool editing() const { return _editing; }
+    /// While editing, taps toggle check marks and nothing is opened. Leaving it clears the selection.
+    void setEditingAnimated(bool editing, bool animated);
+
+    /// The actions that an item's menu offers; none at first.
+    DocumentListActionSet availableActions() const { return _availableActions; }
+    void setAvailableActions(DocumentListActionSet actions) { _availableActions = actions; }
+
+    /// Presents the search field with a query, over the list; with `becomeFirstResponder` it takes the
+    /// keyboard. Searches the names of this list's items.
+    void startSearchWithQueryStringBecomeFirstResponder(const std::string& query, bool becomeFirstResponder);
+    /// Whether the list offers a search field of its own.
+    virtual bool shouldShowSearch() const { return true; }
+
+    /// Lists the folder anew.
+    void refresh();
+
+    /// Objects that others attach to the list, kept as long as it lives; null removes. Ask with the type that
+    /// was attached.
+    void setAssociatedObject(const std::string& key, std::shared_ptr<void> object);
+    template <typename T>
+    std::shared_ptr<T> associatedObject(const std::string& key) const
+    {
+        const auto found = _associatedObjects.find(key);
+        return found == _associatedObjects.end() ? nullptr : std::static_pointer_cast<T>(found->second);
+    }
+
+    void loadView() override;
+    void viewDidLoad() override;
+    void viewDidAppear(bool animated) override;
+
+    /// The parts of the loaded view.
+    const std::shared_ptr<ui::ListView>& listView() const { return _listView; }
+    const std::shared_ptr<PlaceholderView>& placeholder() const { return _placeholder; }
+
+private:
+    void rowActivated(ui::ListView& list, std::size_t index) override;
+    ui::Menu menuForRow(ui::ListView& list, std::size_t index) override;
+    void visibleRowsDidChange(ui::ListView& list, ui::RowRange range) override;
+    void selectionDidChange(ui::ListView& list) override;
+    void refreshRequested(ui::ListView& list) override;
+    std::shared_ptr<ui::ViewController> peekForRow(ui::ListView& list, std::size_t index) override;
+    void peekWasOpened(ui::ListView& list, std::size_t index) override;
+
+    std::shared_ptr<DocumentListController> self();
+    void contentsDidChange(const FolderContentsUpdate& update);
+    void showStateOfFolder();
+    void showLoadingAfterDelay();
+    void reportRemovalIfShown();
+    void open(const Url& url, bool isFolder);
+    void perform(DocumentListAction action, const Url& url);
+
+    std::optional<Url> _presentedURL;
+    std::weak_ptr<DocumentListControllerDelegate> _delegate;
+    std::shared_ptr<ui::ListView> _listView;
+    std::shared_ptr<PlaceholderView> _placeholder;
+    std::shared_ptr<DocumentRowSource> _rows;
+    std::shared_ptr<FolderContents> _contents;
+    std::shared_ptr<DocumentSearch> _search;
+    std::map<std::string, std::shared_ptr<void>> _associatedObjects;
+    DocumentListActionSet _availableActions = 0;
+    bool _editing = false;
+    bool _wasRemoved = false, _reportedRemoval = false;
+};
+
+} // namespace platform::components

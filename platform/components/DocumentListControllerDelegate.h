@@ -1,0 +1,63 @@
+#pragma once
+
+#include "platform/Color.h"
+#include "platform/Url.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace platform::ui {
+class View;
+class ViewController;
+} // namespace platform::ui
+
+namespace platform::components {
+
+class DocumentListController;
+
+/// Is told what happens in a folder list. Main thread only.
+class DocumentListControllerDelegate {
+public:
+    using List = std::shared_ptr<DocumentListController>;
+    using Completion = std::function<void()>; ///< may be empty
+
+    virtual ~DocumentListControllerDelegate() = default;
+
+    /// A folder or a library was tapped; `container` is a new list of it, which nothing shows yet.
+    virtual void documentListControllerDidSelectContainerWithViewController(
+        const List& list, const List& container) = 0;
+    /// A document, a package or a link was tapped.
+    virtual void documentListControllerDidSelectItemAtURL(const List& list, const Url& url) = 0;
+
+    /// The list's items or its selection have changed; also called once when the first listing is complete.
+    virtual void documentListControllerItemsChanged(const List&) { }
+    /// The folder that the list shows is gone. Called once, and only while the list is shown.
+    virtual void documentListControllerURLWasRemoved(const List&) { }
+
+    /// The screen for a peek at an item; null: none.
+    virtual std::shared_ptr<ui::ViewController> documentListControllerViewControllerForPreviewingItemAtURL(
+        const List&, const Url&)
+    {
+        return nullptr;
+    }
+
+    /// The user chose an action of an item; `action` is a code of DocumentListAction. The view is where a
+    /// popover may point (null: nowhere); the completion is to be called when the action has ended.
+    virtual void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,
+        const Url& url, const std::shared_ptr<ui::View>& /*originatingView*/, const Completion& completion)
+    {
+        documentListControllerPerformActionURL(list, action, url);
+        if (completion)
+            completion();
+    }
+    /// The older form, for a delegate that needs neither the view nor the completion.
+    virtual void documentListControllerPerformActionURL(const List&, int /*action*/, const Url&) { }
+
+    /// The dots for an item's tags, one for each name that has a colour.
+    virtual std::vector<Color> documentListControllerColorsForTagNames(
+        const List& list, const std::vector<std::string>& names);
+};
+
+} // namespace platform::components

@@ -1,0 +1,46 @@
+#pragma once
+
+#include "platform/StorageOffers.h"
+#include "platform/ui/Button.h"
+
+#include <memory>
+
+namespace platform::components {
+
+/// Where a storage upgrade button leads.
+class StorageUpgradeLink {
+public:
+    explicit StorageUpgradeLink(StorageOfferLink link)
+        : _link(std::move(link))
+    {
+    }
+
+    /// StorageOfferLink::actionUpgradeInApplication leaves the upgrade to the application.
+    int action() const { return _link.action; }
+    /// Performs what the link does by itself; false when it does nothing by itself.
+    bool performDefaultAction() const;
+
+private:
+    StorageOfferLink _link;
+};
+
+/// The button that leads to more storage. Main thread only.
+class StorageUpgradeButton : public ui::Button {
+public:
+    static std::shared_ptr<StorageUpgradeButton> createButton();
+    /// Whether the button should be shown for an offer: when storage is running low.
+    static bool shouldShowForOffer(const std::shared_ptr<const StorageOffer>& offer);
+
+    StorageUpgradeButton();
+
+    const std::shared_ptr<const StorageOffer>& offer() const { return _offer; }
+    /// Null: no offer, the button has its plain title.
+    void setOffer(std::shared_ptr<const StorageOffer> offer);
+    /// The offer's link; without an offer, one that does nothing.
+    StorageUpgradeLink link() const;
+
+private:
+    std::shared_ptr<const StorageOffer> _offer;
+};
+
+} // namespace platform::components

@@ -1,0 +1,18 @@
+#pragma once
+
+#include "platform/ui/ViewController.h"
+
+#include <memory>
+
+namespace platform::components {
+
+/// What is shown while the drive cannot be used because nobody is signed in: what happened and what to do.
+class UnavailableScreen : public ui::ViewController {
+public:
+    static std::shared_ptr<UnavailableScreen> create();
+
+    UnavailableScreen();
+    void loadView() override;
+};
+
+} // namespace platform::components

@@ -1,0 +1,33 @@
+#pragma once
+
+#include "platform/StorageOffers.h"
+
+#include <memory>
+
+namespace platform::ui {
+class ViewController;
+} // namespace platform::ui
+
+namespace platform::components {
+
+/// Leads from a storage offer to the page where it can be taken up. Main thread only.
+class UpgradeFlow : public std::enable_shared_from_this<UpgradeFlow> {
+public:
+    /// Without an offer the flow does nothing.
+    static std::shared_ptr<UpgradeFlow> initWithOffer(std::shared_ptr<const StorageOffer> offer);
+
+    explicit UpgradeFlow(std::shared_ptr<const StorageOffer> offer)
+        : _offer(std::move(offer))
+    {
+    }
+
+    /// Shows the offer over a screen. Whoever began the flow keeps it until the offer is dismissed.
+    void beginWithPresentingViewController(const std::shared_ptr<ui::ViewController>& presenter);
+
+private:
+    void openPage(const std::shared_ptr<ui::ViewController>& presenter);
+
+    std::shared_ptr<const StorageOffer> _offer;
+};
+
+} // namespace platform::components
