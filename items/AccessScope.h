@@ -1,0 +1,33 @@
+#pragma once
+
+#include "items/PlatformNames.h"
+
+namespace tarrow {
+
+/// Holds security-scoped access to a location for as long as it lives, where the location needs any.
+class AccessScope {
+public:
+    explicit AccessScope(const Url& url)
+        : _url(url)
+        , _started(access().startAccessing(url))
+    {
+    }
+    ~AccessScope()
+    {
+        if (_started)
+            access().stopAccessing(_url);
+    }
+    AccessScope(const AccessScope&) = delete;
+    AccessScope& operator=(const AccessScope&) = delete;
+
+private:
+    static platform::SecurityScopedAccess& access()
+    {
+        return services().cloudDocumentService().securityScopedAccess();
+    }
+
+    Url _url;
+    bool _started;
+};
+
+} // namespace tarrow

@@ -1,0 +1,71 @@
+#include "items/DocumentIdentifiers.h"
+
+#include "items/FileUtils.h"
+
+#include <charconv>
+#include <limits>
+#include <system_error>
+#include <utility>
+
+namespace tarrow {
+
+namespace {
+
+/// The number at the start of a text; one that is too large counts as the largest.
+std::optional<std::uint64_t> leadingNumber(std::string_view text)
+{
+    text.remove_prefix(std::min(text.find_first_not_of(" \t\n\v\f\r"), text.size()));
+    std::uint64_t number = 0;
+    const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), number);
+    if (error == std::errc::result_out_of_range)
+        return std::numeric_limits<std::uint64_t>::max();
+    return error == std::errc{} ? std::optional(number) : std::nullopt;
+}
+
+std::optional<Url> resolveDocumentID(std::uint64_t identifier)
+{
+    // The file system keeps 32 bits: a longer number must not be taken for the document with its low half.
+    if (identifier > std::numeric_limits<std::uint32_t>::max())
+        return std::nullopt;
+    return services().cloudDocumentService().items().documentWithIdentifier(
+        static_cast<std::uint32_t>(identifier));
+}
+
+} // namespace
+
+std::int64_t trw_DocumentID(const Url& url)
+{
+    const auto value = FileUtils::getResourceValueForURL(AttributeKey::DocumentIdentifier, url);
+    const auto* number = value ? std::get_if<std::uint64_t>(&*value) : nullptr;
+    return number ? static_cast<std::int64_t>(*number) : 0;
+}
+
+std::optional<Url> trw_URLFromDocumentID(const std::optional<std::string>& documentID)
+{
+    static constexpr Operation op{"+[Url(TarrowDriveApp_StrataAdditions) trw_URLFromDocumentID:]"};
+    if (!documentID) {
+        op.error("trw_URLFromDocumentID: missing document ID");
+        return std::nullopt;
+    }
+    const auto identifier = leadingNumber(*documentID);
+    if (!identifier)
+        return std::nullopt;
+    if (!services().cloudDocumentService().containers().defaultContainerURL()) {
+        op.error("could not get device ID");
+        return std::nullopt;
+    }
+    auto url = resolveDocumentID(*identifier);
+    if (!url) {
+        const auto missing = std::make_error_code(std::errc::no_such_file_or_directory);
+        op.error("VXLibraryResolveDocumentId2 failed, errno:%d(%s)", missing.value(), missing.message());
+        return std::nullopt;
+    }
+    const auto found = trw_DocumentID(*url);
+    if (std::cmp_not_equal(found, *identifier)) {
+        op.error("document IDs didn't match (%d v/s %@)", found, *identifier);
+        return std::nullopt;
+    }
+    return url;
+}
+
+} // namespace tarrow

@@ -1,0 +1,33 @@
+#pragma once
+
+#include "platform/Attributes.h"
+#include "platform/CloudDocumentService.h"
+#include "platform/Error.h"
+#include "platform/Formatters.h"
+#include "platform/Log.h"
+#include "platform/Services.h"
+
+/// The platform's values, under the names by which the program speaks of them.
+namespace tarrow {
+
+using platform::AttributeKey;
+using platform::AttributeKeys;
+using platform::AttributeMap;
+using platform::AttributeValue;
+using platform::Date;
+using platform::DateStyle;
+using platform::DocumentContainer;
+using platform::Error;
+using platform::FileErrorCode;
+using platform::Image;
+using platform::Operation;
+using platform::PropertyArray;
+using platform::PropertyDictionary;
+using platform::PropertyValue;
+using platform::Result;
+using platform::ThumbnailMap;
+using platform::Url;
+
+using platform::services;
+
+} // namespace tarrow
