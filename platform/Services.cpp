@@ -8,6 +8,8 @@
 #include "platform/FileSystem.h"
 #include "platform/FolderLister.h"
 #include "platform/Formatters.h"
+#include "platform/ImageLoader.h"
+#include "platform/LinkOpener.h"
 #include "platform/Localization.h"
 #include "platform/NotificationCenter.h"
 #include "platform/PreviewSupport.h"

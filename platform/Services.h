@@ -11,7 +11,9 @@ class FileCoordinator;
 class FileSystem;
 class FolderLister;
 class Formatters;
+class ImageLoader;
 class KeyedArchiver;
+class LinkOpener;
 class Localization;
 class NotificationCenter;
 class PreviewSupport;
@@ -28,7 +30,9 @@ struct ServiceSet {
     std::shared_ptr<FileSystem> fileSystem;
     std::shared_ptr<FolderLister> folderLister;
     std::shared_ptr<Formatters> formatters;
+    std::shared_ptr<ImageLoader> imageLoader;
     std::shared_ptr<KeyedArchiver> keyedArchiver;
+    std::shared_ptr<LinkOpener> linkOpener;
     std::shared_ptr<Localization> localization;
     std::shared_ptr<NotificationCenter> notificationCenter;
     std::shared_ptr<PreviewSupport> previewSupport;
@@ -52,7 +56,9 @@ public:
     FileSystem& fileSystem() const { return *_set.fileSystem; }
     FolderLister& folderLister() const { return *_set.folderLister; }
     Formatters& formatters() const { return *_set.formatters; }
+    ImageLoader& imageLoader() const { return *_set.imageLoader; }
     KeyedArchiver& keyedArchiver() const { return *_set.keyedArchiver; }
+    LinkOpener& linkOpener() const { return *_set.linkOpener; }
     Localization& localization() const { return *_set.localization; }
     NotificationCenter& notificationCenter() const { return *_set.notificationCenter; }
     PreviewSupport& previewSupport() const { return *_set.previewSupport; }
