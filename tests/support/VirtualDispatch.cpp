@@ -10,7 +10,7 @@ namespace {
 using platform::Duration;
 using platform::Work;
 
-class VirtualQueue : public platform::Queue {
+class VirtualQueue : public platform::Queue, public std::enable_shared_from_this<VirtualQueue> {
 public:
     VirtualQueue(std::weak_ptr<VirtualDispatch> dispatch, std::string label)
         : _dispatch(std::move(dispatch))
@@ -20,7 +20,7 @@ public:
     void async(Work work) override
     {
         if (const auto dispatch = _dispatch.lock())
-            dispatch->submit(Duration::zero(), std::move(work));
+            dispatch->submit(Duration::zero(), weak_from_this(), std::move(work));
     }
     const std::string& label() const override { return _label; }
 
@@ -33,21 +33,22 @@ class VirtualOperationQueue : public platform::OperationQueue {
 public:
     VirtualOperationQueue(
         std::weak_ptr<VirtualDispatch> dispatch, std::string name, platform::QualityOfService quality)
-        : _queue(std::move(dispatch), std::move(name))
+        : _queue(std::make_shared<VirtualQueue>(std::move(dispatch), std::move(name)))
         , _quality(quality)
     {
     }
-    void addOperation(Work work) override { _queue.async(std::move(work)); }
-    const std::string& name() const override { return _queue.label(); }
+    void addOperation(Work work) override { _queue->async(std::move(work)); }
+    const std::string& name() const override { return _queue->label(); }
     platform::QualityOfService qualityOfService() const override { return _quality; }
 
 private:
-    VirtualQueue _queue;
+    std::shared_ptr<VirtualQueue> _queue;
     platform::QualityOfService _quality;
 };
 
 struct VirtualTimerState {
     std::weak_ptr<VirtualDispatch> dispatch;
+    std::shared_ptr<platform::Queue> queue;
     Duration period;
     Work handler;
     std::atomic<bool> cancelled = false;
@@ -58,7 +59,7 @@ void fire(const std::shared_ptr<VirtualTimerState>& state)
     if (state->cancelled)
         return;
     if (const auto dispatch = state->dispatch.lock())
-        dispatch->submit(state->period, [state] { fire(state); });
+        dispatch->submit(state->period, state, [weak = std::weak_ptr(state)] { fire(weak.lock()); });
     state->handler();
 }
 
@@ -79,12 +80,10 @@ private:
 
 std::shared_ptr<platform::Queue> VirtualDispatch::mainQueue()
 {
-    auto queue = _mainQueue.lock();
-    if (!queue) {
-        queue = std::make_shared<VirtualQueue>(weak_from_this(), "main");
-        _mainQueue = queue;
-    }
-    return queue;
+    const std::lock_guard lock(_mutex);
+    if (!_mainQueue)
+        _mainQueue = std::make_shared<VirtualQueue>(weak_from_this(), "main");
+    return _mainQueue;
 }
 
 std::shared_ptr<platform::Queue> VirtualDispatch::makeSerialQueue(std::string label)
@@ -98,19 +97,21 @@ std::shared_ptr<platform::OperationQueue> VirtualDispatch::makeOperationQueue(
     return std::make_shared<VirtualOperationQueue>(weak_from_this(), std::move(name), quality);
 }
 
-void VirtualDispatch::after(Duration delay, const std::shared_ptr<platform::Queue>&, Work work)
+void VirtualDispatch::after(Duration delay, const std::shared_ptr<platform::Queue>& queue, Work work)
 {
-    submit(delay, std::move(work));
+    // The delay holds the queue, as the host's does.
+    submit(delay, weak_from_this(), [queue, work = std::move(work)] { work(); });
 }
 
 std::unique_ptr<platform::Timer> VirtualDispatch::startTimer(
-    const std::shared_ptr<platform::Queue>&, Duration period, Duration, Work handler)
+    const std::shared_ptr<platform::Queue>& queue, Duration period, Duration, Work handler)
 {
     auto state = std::make_shared<VirtualTimerState>();
     state->dispatch = weak_from_this();
+    state->queue = queue;
     state->period = period;
     state->handler = std::move(handler);
-    submit(Duration::zero(), [state] { fire(state); });
+    submit(Duration::zero(), state, [weak = std::weak_ptr(state)] { fire(weak.lock()); });
     return std::make_unique<VirtualTimer>(std::move(state));
 }
 
@@ -120,15 +121,16 @@ platform::Date VirtualDispatch::now() const
     return {_now};
 }
 
-void VirtualDispatch::submit(Duration delay, Work work)
+void VirtualDispatch::submit(Duration delay, std::weak_ptr<const void> queue, Work work)
 {
     const std::lock_guard lock(_mutex);
-    _pending.push_back({_now + delay.count(), _nextOrder++, std::move(work)});
+    _pending.push_back({_now + delay.count(), _nextOrder++, std::move(queue), std::move(work)});
 }
 
 bool VirtualDispatch::runNext(std::int64_t limit)
 {
     Work work;
+    std::shared_ptr<const void> queue;
     {
         const std::lock_guard lock(_mutex);
         const auto next = std::ranges::min_element(_pending, [](const Pending& a, const Pending& b) {
@@ -138,9 +140,11 @@ bool VirtualDispatch::runNext(std::int64_t limit)
             return false;
         _now = std::max(_now, next->due);
         work = std::move(next->work);
+        queue = next->queue.lock();
         _pending.erase(next);
     }
-    work();
+    if (queue)
+        work();
     return true;
 }
 
@@ -160,7 +164,8 @@ void VirtualDispatch::advance(double seconds)
 std::size_t VirtualDispatch::pendingCount() const
 {
     const std::lock_guard lock(_mutex);
-    return _pending.size();
+    return static_cast<std::size_t>(
+        std::ranges::count_if(_pending, [](const Pending& pending) { return !pending.queue.expired(); }));
 }
 
 } // namespace testing_support

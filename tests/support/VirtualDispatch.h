@@ -34,12 +34,14 @@ public:
     /// How many pieces of work wait, timers included.
     std::size_t pendingCount() const;
 
-    void submit(platform::Duration delay, platform::Work work);
+    /// Adds work that is dropped when the queue that it waits for is destroyed first.
+    void submit(platform::Duration delay, std::weak_ptr<const void> queue, platform::Work work);
 
 private:
     struct Pending {
         std::int64_t due;
         std::uint64_t order;
+        std::weak_ptr<const void> queue;
         platform::Work work;
     };
     bool runNext(std::int64_t limit);
@@ -50,7 +52,7 @@ private:
         1'700'000'000'000'000'000; // a fixed moment of 2023, so that texts with dates do not change
     std::uint64_t _nextOrder = 0;
     std::thread::id _owner = std::this_thread::get_id();
-    std::weak_ptr<platform::Queue> _mainQueue;
+    std::shared_ptr<platform::Queue> _mainQueue;
 };
 
 } // namespace testing_support

@@ -1,0 +1,38 @@
+#pragma once
+
+#include "platform/Log.h"
+
+#include <string>
+
+namespace host::system {
+
+/// What the environment asks of the log. TARROW_LOG_LEVEL is "debug", "info", "warning" or "error"
+/// (otherwise debug in development builds, else info); TARROW_LOG_PRIVATE=1 shows private values and 0 hides
+/// them (otherwise shown in development builds only).
+struct LogSettings {
+    platform::LogLevel lowest;
+    platform::PrivateValues privacy;
+
+    static LogSettings fromEnvironment();
+};
+
+/// Writes the log to the journal when standard error is one, with the level, the operation and the user
+/// action as fields, and otherwise to standard error as text. A line is one write.
+class JournalLogSink : public platform::LogSink {
+public:
+    explicit JournalLogSink(platform::PrivateValues privacy);
+
+    void write(const platform::LogLine& line) override;
+    void openActivity(std::string_view label) override;
+
+private:
+    void writeToJournal(const platform::LogLine& line) const;
+
+    platform::PrivateValues _privacy;
+    bool _isJournal;
+};
+
+/// Makes the sink that the environment asks for and installs it with its level. Call it first in main.
+void installSystemLog();
+
+} // namespace host::system

@@ -1,0 +1,31 @@
+#pragma once
+
+#include "platform/Dispatch.h"
+
+#include <memory>
+#include <thread>
+
+namespace host::system {
+
+/// The queue of the thread that makes it: its work runs when that thread iterates GLib's default main
+/// context. Work that has not run when the queue is destroyed never runs.
+class MainQueue : public platform::Queue {
+public:
+    MainQueue();
+    ~MainQueue() override;
+    MainQueue(const MainQueue&) = delete;
+    MainQueue& operator=(const MainQueue&) = delete;
+
+    void async(platform::Work work) override;
+    const std::string& label() const override { return _label; }
+    bool isCurrentThread() const { return std::this_thread::get_id() == _thread; }
+
+private:
+    struct State;
+    struct Source;
+    std::shared_ptr<State> _state;
+    std::string _label = "main";
+    std::thread::id _thread = std::this_thread::get_id();
+};
+
+} // namespace host::system

@@ -1,0 +1,86 @@
+#include "host/system/PosixFileSystem.h"
+
+#include "host/system/DeepEnumeration.h"
+#include "host/system/DirectoryReader.h"
+#include "host/system/SystemErrors.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <sys/xattr.h>
+
+#include <cerrno>
+#include <climits>
+
+namespace host::system {
+
+using platform::Date;
+using platform::FileAttributes;
+using platform::FileType;
+
+namespace {
+
+Date date(const statx_timestamp& time)
+{
+    return {time.tv_sec * 1'000'000'000 + time.tv_nsec};
+}
+
+bool isExtensionHidden(const std::string& path)
+{
+    char value[2];
+    return lgetxattr(path.c_str(), hiddenExtensionAttribute, value, sizeof value) == 1 && value[0] == '1';
+}
+
+/// The system would take the part before a NUL for the whole path.
+bool holdsNul(const std::string& path)
+{
+    return path.find('\0') != std::string::npos;
+}
+
+} // namespace
+
+platform::Result<FileAttributes> PosixFileSystem::attributesOfItem(const std::string& path) const
+{
+    if (holdsNul(path))
+        return systemError(EILSEQ, path);
+    struct statx found;
+    constexpr int flags = AT_SYMLINK_NOFOLLOW | AT_NO_AUTOMOUNT;
+    if (statx(AT_FDCWD, path.c_str(), flags, STATX_BASIC_STATS | STATX_BTIME, &found) != 0)
+        return systemError(errno, path);
+    FileAttributes attributes;
+    attributes.type = fileType(found.stx_mode);
+    attributes.size = found.stx_size;
+    if (found.stx_mask & STATX_BTIME)
+        attributes.creationDate = date(found.stx_btime);
+    attributes.modificationDate = date(found.stx_mtime);
+    attributes.extensionHidden = isExtensionHidden(path);
+    return attributes;
+}
+
+platform::Result<std::string> PosixFileSystem::destinationOfSymbolicLink(const std::string& path) const
+{
+    if (holdsNul(path))
+        return systemError(EILSEQ, path);
+    std::string destination(PATH_MAX, '\0');
+    const auto length = ::readlink(path.c_str(), destination.data(), destination.size());
+    if (length < 0)
+        return systemError(errno, path);
+    destination.resize(static_cast<std::size_t>(length));
+    return destination;
+}
+
+std::optional<FileType> PosixFileSystem::typeOfItem(const std::string& path) const
+{
+    struct stat found;
+    if (holdsNul(path) || ::stat(path.c_str(), &found) != 0)
+        return std::nullopt;
+    return fileType(found.st_mode);
+}
+
+void PosixFileSystem::enumerateDeeply(const platform::Url& folder,
+    const std::function<Continue(const platform::Url&, FileType)>& entry,
+    const std::function<Continue(const platform::Url&, const platform::Error&)>& error) const
+{
+    DeepEnumeration(folder, entry, error).run();
+}
+
+} // namespace host::system

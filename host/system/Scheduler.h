@@ -1,0 +1,33 @@
+#pragma once
+
+#include "platform/Dispatch.h"
+
+#include <chrono>
+#include <memory>
+#include <thread>
+
+namespace host::system {
+
+/// One thread that calls brief handlers when their time has come. The clock is monotonic. Any thread may
+/// schedule.
+class Scheduler {
+public:
+    using Clock = std::chrono::steady_clock;
+
+    Scheduler();
+    /// Drops what is not due yet and waits for a handler that runs, unless it runs on this thread.
+    ~Scheduler();
+    Scheduler(const Scheduler&) = delete;
+    Scheduler& operator=(const Scheduler&) = delete;
+
+    /// Calls once, at `due` or up to `leeway` later: handlers whose spans overlap share one waking.
+    void schedule(Clock::time_point due, platform::Duration leeway, platform::Work handler);
+
+private:
+    struct State;
+    static void run(const std::shared_ptr<State>& state);
+    std::shared_ptr<State> _state;
+    std::thread _thread;
+};
+
+} // namespace host::system

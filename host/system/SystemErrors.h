@@ -1,0 +1,21 @@
+#pragma once
+
+#include "platform/Error.h"
+
+#include <optional>
+#include <string>
+#include <string_view>
+
+namespace host::system {
+
+/// The error for a system call that failed with `errorNumber` on a path: ENOENT is NoSuchItem, EEXIST is
+/// ItemExists, ENAMETOOLONG and EILSEQ are InvalidName, all in errorDomain::file; anything else is
+/// errorDomain::system with the number as its code. The user information holds the path, the destination of a
+/// move when there is one, and a sentence for the user that names the item.
+platform::Error systemError(
+    int errorNumber, std::string_view path, const std::optional<std::string>& destination = std::nullopt);
+
+/// The last name of a path as text for people: bytes that are no UTF-8 become replacement characters.
+std::string displayName(std::string_view path);
+
+} // namespace host::system
