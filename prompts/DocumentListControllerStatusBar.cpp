@@ -1,0 +1,131 @@
+#include "prompts/DocumentListControllerStatusBar.h"
+
+#include "platform/Log.h"
+#include "platform/components/DocumentListController.h"
+#include "platform/components/StorageUpgradeButton.h"
+#include "platform/ui/Label.h"
+#include "platform/ui/Screen.h"
+#include "prompts/DriveStatusLabelView.h"
+
+namespace tarrow {
+
+using platform::Operation;
+using platform::components::DocumentListController;
+using platform::components::StorageUpgradeButton;
+using platform::ui::BarButtonItem;
+using platform::ui::Font;
+using platform::ui::SystemItem;
+
+namespace {
+
+constexpr auto associationKey = "_TarrowDriveAppStatusBar";
+
+using Offer = DocumentListControllerStatusBar::Offer;
+
+bool equal(const Offer& a, const Offer& b)
+{
+    return a && b ? *a == *b : a == b;
+}
+
+bool isToBeShown(const Offer& offer)
+{
+    return offer && StorageUpgradeButton::shouldShowForOffer(offer);
+}
+
+std::shared_ptr<platform::ui::Label> makePrimaryLabel()
+{
+    auto label = std::make_shared<platform::ui::Label>();
+    // The toolbar does not grow with the user's text size, so neither may the line in it.
+    label->setFont(Font::preferred(platform::ui::TextStyle::Caption2).fixed());
+    label->setTextColor(platform::Color::black());
+    label->sizeToFit();
+    return label;
+}
+
+} // namespace
+
+void DocumentListControllerStatusBar::createStatusBarButtonPressDelegate(
+    const Offer& offer, const std::shared_ptr<DocumentListControllerStatusBarDelegate>& delegate)
+{
+    _delegate = delegate;
+    const auto& screen = platform::ui::Screen::main();
+    _labelsView = DriveStatusLabelView::initWithFrame(screen ? screen->statusBarFrame : platform::Rect{});
+    configureLabels(offer);
+    _toolbarItems = {std::make_shared<BarButtonItem>(SystemItem::FlexibleSpace),
+        std::make_shared<BarButtonItem>(_labelsView),
+        std::make_shared<BarButtonItem>(SystemItem::FlexibleSpace)};
+}
+
+void DocumentListControllerStatusBar::configureLabels(const Offer& offer)
+{
+    _labelsView->setPrimaryLabel(makePrimaryLabel());
+    _labelsView->addSubview(_labelsView->primaryLabel());
+
+    const auto button = StorageUpgradeButton::createButton();
+    button->setOffer(offer);
+    button->setAction([weak = weak_from_this(), pressed = std::weak_ptr(button)] {
+        const auto self = weak.lock();
+        const auto sender = pressed.lock();
+        if (self && sender)
+            self->upgradeStoragePressed(*sender);
+    });
+    button->sizeToFit();
+    button->setHidden(true);
+    _labelsView->setQuotaButton(button);
+    _labelsView->addSubview(button);
+    _labelsView->showLowQuota(isToBeShown(offer));
+}
+
+void DocumentListControllerStatusBar::setStatusText(const std::string& text)
+{
+    _labelsView->setPrimaryLabelText(text);
+}
+
+void DocumentListControllerStatusBar::showUpgradeOffer(const Offer& offer)
+{
+    const auto& button = _labelsView->quotaButton();
+    if (!equal(button->offer(), offer))
+        button->setOffer(offer);
+    _labelsView->showLowQuota(isToBeShown(offer));
+}
+
+void DocumentListControllerStatusBar::upgradeStoragePressed(const StorageUpgradeButton& button)
+{
+    static constexpr Operation op{"-[DocumentListControllerStatusBar upgradeStoragePressed:]"};
+    op.userAction("Pressed Upgrade Storage");
+    const auto link = button.link();
+    op.info("UpgradeStorage button pressed, link.action=%{public}@", link.action());
+    if (link.performDefaultAction()) {
+        op.info("UpgradeStorage button pressed, launched default action (Manage Storage?)");
+        return;
+    }
+    const auto delegate = _delegate.lock();
+    if (delegate && link.action() == platform::StorageOfferLink::actionUpgradeInApplication)
+        delegate->upgradeStorageButtonPressed();
+}
+
+std::shared_ptr<DocumentListControllerStatusBar> statusBar(const DocumentListController& list)
+{
+    return list.associatedObject<DocumentListControllerStatusBar>(associationKey);
+}
+
+void setStatusBar(DocumentListController& list, std::shared_ptr<DocumentListControllerStatusBar> statusBar)
+{
+    list.setAssociatedObject(associationKey, std::move(statusBar));
+}
+
+void createStatusBarButtonPressDelegate(DocumentListController& list, const Offer& offer,
+    const std::shared_ptr<DocumentListControllerStatusBarDelegate>& delegate)
+{
+    const auto created = std::make_shared<DocumentListControllerStatusBar>();
+    setStatusBar(list, created);
+    created->createStatusBarButtonPressDelegate(offer, delegate);
+}
+
+void displayStatusBar(DocumentListController& list)
+{
+    if (const auto shown = statusBar(list))
+        list.setToolbarItems(shown->toolbarItems());
+}
+
+} // namespace tarrow

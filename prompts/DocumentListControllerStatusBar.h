@@ -1,0 +1,69 @@
+#pragma once
+
+#include "platform/StorageOffers.h"
+#include "platform/ui/BarButtonItem.h"
+
+#include <memory>
+#include <string>
+
+namespace platform::components {
+class DocumentListController;
+class StorageUpgradeButton;
+}
+
+namespace tarrow {
+
+class DriveStatusLabelView;
+
+/// Is told that the user wants more storage. Main thread.
+class DocumentListControllerStatusBarDelegate {
+public:
+    virtual ~DocumentListControllerStatusBarDelegate() = default;
+    virtual void upgradeStorageButtonPressed() = 0;
+};
+
+/// What the toolbar of one folder list shows: the status line and, while storage is low, the upgrade button.
+/// Main thread.
+class DocumentListControllerStatusBar : public std::enable_shared_from_this<DocumentListControllerStatusBar> {
+public:
+    using Offer = std::shared_ptr<const platform::StorageOffer>; ///< null: none
+
+    /// Builds the content. The delegate may be null.
+    void createStatusBarButtonPressDelegate(
+        const Offer& offer, const std::shared_ptr<DocumentListControllerStatusBarDelegate>& delegate);
+    /// Builds the line and the button.
+    void configureLabels(const Offer& offer);
+
+    void setStatusText(const std::string& text);
+    /// Gives the button an offer, and shows it when the offer says that storage is low.
+    void showUpgradeOffer(const Offer& offer);
+    /// The button was pressed: its link's own action is performed; a link without one that leaves the upgrade to
+    /// the application is left to the delegate.
+    void upgradeStoragePressed(const platform::components::StorageUpgradeButton& button);
+
+    const std::shared_ptr<DriveStatusLabelView>& labelsView() const { return _labelsView; }
+    std::shared_ptr<DocumentListControllerStatusBarDelegate> delegate() const { return _delegate.lock(); }
+    /// Flexible space, the content, flexible space.
+    const platform::ui::BarButtonItems& toolbarItems() const { return _toolbarItems; }
+
+private:
+    std::shared_ptr<DriveStatusLabelView> _labelsView;
+    std::weak_ptr<DocumentListControllerStatusBarDelegate> _delegate;
+    platform::ui::BarButtonItems _toolbarItems;
+};
+
+// The status bar of a folder list, which owns it.
+
+/// Null before it is created.
+std::shared_ptr<DocumentListControllerStatusBar> statusBar(
+    const platform::components::DocumentListController& list);
+void setStatusBar(platform::components::DocumentListController& list,
+    std::shared_ptr<DocumentListControllerStatusBar> statusBar);
+/// Creates a status bar for the list, in place of an earlier one.
+void createStatusBarButtonPressDelegate(platform::components::DocumentListController& list,
+    const DocumentListControllerStatusBar::Offer& offer,
+    const std::shared_ptr<DocumentListControllerStatusBarDelegate>& delegate);
+/// Puts the status bar into the list's toolbar.
+void displayStatusBar(platform::components::DocumentListController& list);
+
+} // namespace tarrow

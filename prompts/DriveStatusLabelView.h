@@ -1,0 +1,57 @@
+#pragma once
+
+#include "platform/ui/View.h"
+
+#include <memory>
+#include <string>
+
+namespace platform::components {
+class StorageUpgradeButton;
+}
+namespace platform::ui {
+class Label;
+}
+
+namespace tarrow {
+
+/// The status line under a folder list, centred, with the upgrade button below it while storage is low.
+class DriveStatusLabelView : public platform::ui::View {
+public:
+    /// A view that grows and shrinks with what it stands in. It has no label and no button yet.
+    static std::shared_ptr<DriveStatusLabelView> initWithFrame(const platform::Rect& frame);
+    explicit DriveStatusLabelView(const platform::Rect& frame);
+
+    /// The status line; null before it is set.
+    const std::shared_ptr<platform::ui::Label>& primaryLabel() const { return _primaryLabel; }
+    void setPrimaryLabel(std::shared_ptr<platform::ui::Label> label) { _primaryLabel = std::move(label); }
+    /// The upgrade button; null before it is set.
+    const std::shared_ptr<platform::components::StorageUpgradeButton>& quotaButton() const
+    {
+        return _quotaButton;
+    }
+    void setQuotaButton(std::shared_ptr<platform::components::StorageUpgradeButton> button);
+
+    void setPrimaryLabelText(const std::string& text);
+
+    /// Whether the button is shown and laid out; false at first.
+    bool showLowQuota() const { return _showLowQuota; }
+    /// Keeps the flag and changes nothing else.
+    void setShowLowQuota(bool show) { _showLowQuota = show; }
+    /// Shows or hides the button.
+    void showLowQuota(bool show);
+
+    void layoutSubviews() override;
+    /// As wide as the wider one of the two, high enough for both, one above the other.
+    platform::Size intrinsicContentSize(double maxWidth = 0) const override;
+
+private:
+    struct Block;
+    Block block(double labelHeight, double titleHeight) const;
+    double titleHeight(double labelHeight) const;
+
+    std::shared_ptr<platform::ui::Label> _primaryLabel;
+    std::shared_ptr<platform::components::StorageUpgradeButton> _quotaButton;
+    bool _showLowQuota = false;
+};
+
+} // namespace tarrow
