@@ -75,6 +75,12 @@ public:
         log(LogLevel::Error, format, args...);
     }
 
+    /// Whether lines of this level are written, for a loop whose every turn would log.
+    static bool isWritten(LogLevel level)
+    {
+        return level >= detail::lowestLogLevel.load(std::memory_order_relaxed);
+    }
+
     /// Opens the user-action activity with this label and logs the label.
     void userAction(
         std::string_view label, std::source_location where = std::source_location::current()) const;

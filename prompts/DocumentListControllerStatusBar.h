@@ -9,7 +9,7 @@
 namespace platform::components {
 class DocumentListController;
 class StorageUpgradeButton;
-}
+} // namespace platform::components
 
 namespace tarrow {
 
@@ -37,8 +37,8 @@ public:
     void setStatusText(const std::string& text);
     /// Gives the button an offer, and shows it when the offer says that storage is low.
     void showUpgradeOffer(const Offer& offer);
-    /// The button was pressed: its link's own action is performed; a link without one that leaves the upgrade to
-    /// the application is left to the delegate.
+    /// The button was pressed: its link's own action is performed; a link without one that leaves the upgrade
+    /// to the application is left to the delegate.
     void upgradeStoragePressed(const platform::components::StorageUpgradeButton& button);
 
     const std::shared_ptr<DriveStatusLabelView>& labelsView() const { return _labelsView; }

@@ -101,8 +101,8 @@ void DriveStatusLabelView::layoutSubviews()
     const auto [gap, height] = block(label.height, title);
     const auto area = bounds();
     label = placed(label, (area.width - label.width) * 0.5, (area.height - height) * 0.5 - lift);
-    button = placed(button, (area.width - button.width) * 0.5,
-        label.maxY() + gap - (button.height - title) * 0.5);
+    button =
+        placed(button, (area.width - button.width) * 0.5, label.maxY() + gap - (button.height - title) * 0.5);
     if (_primaryLabel)
         _primaryLabel->setFrame(label);
     if (_quotaButton)

@@ -33,15 +33,12 @@ void UIUtils::showAlertMessageParentViewController(
 {
     if (!parent)
         return;
-    const auto alert
-        = std::make_shared<AlertController>(title, message, platform::ui::AlertStyle::Alert);
-    alert->addAction(
-        std::make_shared<AlertAction>(localized("OK"), platform::ui::AlertActionStyle::Default));
+    const auto alert = std::make_shared<AlertController>(title, message, platform::ui::AlertStyle::Alert);
+    alert->addAction(std::make_shared<AlertAction>(localized("OK"), platform::ui::AlertActionStyle::Default));
     parent->presentViewController(alert, true);
 }
 
-void UIUtils::showErrorParentViewController(
-    const Error& error, const std::shared_ptr<ViewController>& parent)
+void UIUtils::showErrorParentViewController(const Error& error, const std::shared_ptr<ViewController>& parent)
 {
     showAlertMessageParentViewController(describe(error), {}, parent);
 }

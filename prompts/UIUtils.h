@@ -30,7 +30,8 @@ public:
     /// Whether the device is a tablet.
     static bool tabulaMode();
 
-    /// Makes a screen a part of another one: its view becomes a subview of the parent's, in front of the others.
+    /// Makes a screen a part of another one: its view becomes a subview of the parent's, in front of the
+    /// others.
     static void addChildViewControllerChildViewController(
         const std::shared_ptr<platform::ui::ViewController>& parent,
         const std::shared_ptr<platform::ui::ViewController>& child);
