@@ -38,6 +38,11 @@ std::string textOrEmpty(const AttributeMap& values, AttributeKey key)
     return text ? *text : std::string();
 }
 
+std::vector<std::string> tagNames(const Url& url)
+{
+    return promisedItems().tagNames(url).value.value_or(std::vector<std::string>());
+}
+
 bool isSharedByAnother(const AttributeMap& values)
 {
     const auto* role = values.get<platform::SharedItemRole>(AttributeKey::SharedItemRole);
@@ -70,7 +75,6 @@ bool DRItem::cacheValues()
     _isBookmark = promisedItems().isExternalDocumentReference(_url);
     if (!_resolvedURL)
         return true; // a reference to nowhere gives no location that a reading could be coordinated for
-    _promiseURL = promisedItems().physicalURLForPromise(*_resolvedURL);
     return readCoordinated(Url(*_resolvedURL)) || initFromAttributes();
 }
 
@@ -81,16 +85,17 @@ bool DRItem::readCoordinated(const Url& resolved)
     services().fileCoordinator().coordinateReading(resolved,
         platform::ReadingOptions::ImmediatelyAvailableMetadataOnly,
         [&](const Url& location) { isRead = readValues(location); });
+    if (!_promiseURL)
+        _promiseURL = promisedItems().physicalURLForPromise(resolved);
     return isRead;
 }
 
 bool DRItem::readValues(const Url& location)
 {
     static constexpr Operation op{"-[DRItem cacheValues]"};
-    if (promisedItems().checkPromisedItemIsReachable(location))
-        return false;
-    auto values = promisedItems().promisedItemResourceValues(location, prefetchedKeys);
-    if (values.error && values.error->is(FileErrorCode::NoSuchItem))
+    auto reading = promisedItems().readItem(location, prefetchedKeys);
+    auto& values = reading.values;
+    if (reading.unreachable || (values.error && values.error->is(FileErrorCode::NoSuchItem)))
         return false;
     if (!values) {
         op.warning("promisedItemResourceValuesForKeys failed on %@", location);
@@ -98,10 +103,12 @@ bool DRItem::readValues(const Url& location)
         if (!values)
             return false;
     }
+    _promiseURL = isResolvedURL(location) ? std::move(reading.physicalURL)
+                                          : promisedItems().physicalURLForPromise(*_resolvedURL);
     initFromKeysAndValuesWithURL(*values, location);
     _canPreview = _resolvedURL && services().previewSupport().canPreview(*_resolvedURL);
     if (_resolvedURL)
-        _tags = promisedItems().tagNames(*_resolvedURL).value.value_or(std::vector<std::string>());
+        _tags = isResolvedURL(location) ? std::move(reading.tagNames) : tagNames(*_resolvedURL);
     return true;
 }
 
@@ -118,6 +125,11 @@ void DRItem::initFromKeysAndValuesWithURL(const AttributeMap& values, const Url&
     readContainer(values, url);
     const auto* status = values.get<platform::DownloadingStatus>(AttributeKey::DownloadingStatus);
     _isDownloaded = status && *status != platform::DownloadingStatus::NotDownloaded;
+}
+
+bool DRItem::isResolvedURL(const Url& location) const
+{
+    return _resolvedURL && location.isSameObject(*_resolvedURL);
 }
 
 void DRItem::readType(const AttributeMap& values, const Url& location)

@@ -123,6 +123,7 @@ public:
 private:
     void fetchThumbnail(const Url& resolved);
     bool readCoordinated(const Url& resolved);
+    bool isResolvedURL(const Url& location) const;
     bool readValues(const Url& location);
     void readType(const AttributeMap& values, const Url& location);
     void readSize(const AttributeMap& values);

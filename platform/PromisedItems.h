@@ -9,6 +9,14 @@
 
 namespace platform {
 
+/// What one look at an item found.
+struct ItemReading {
+    std::optional<Error> unreachable; ///< as PromisedItems::checkPromisedItemIsReachable()
+    Result<AttributeMap> values; ///< as promisedItemResourceValues()
+    Url physicalURL; ///< as physicalURLForPromise()
+    std::vector<std::string> tagNames; ///< as tagNames(); empty on failure
+};
+
 /// Items of the drive by their logical location, whether they are here or only promised.
 ///
 /// A promise stands for an item whose content is still in the cloud. Its logical location is where the item
@@ -26,6 +34,10 @@ public:
     /// has no value for are left out. Errors: FileErrorCode::NoSuchItem when there is none; others when its
     /// record is damaged.
     virtual Result<AttributeMap> promisedItemResourceValues(const Url& url, AttributeKeys keys) const = 0;
+
+    /// Reachability, attributes, place and tags of an item in one go: quicker than asking for each, and all
+    /// of the same moment.
+    virtual ItemReading readItem(const Url& url, AttributeKeys keys) const;
 
     /// Reads attributes of what lies at a location in the file system; a promise is not looked for.
     virtual Result<AttributeMap> resourceValues(const Url& url, AttributeKeys keys) const = 0;
