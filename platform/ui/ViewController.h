@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/Geometry.h"
+#include "platform/StateCoder.h"
 #include "platform/ui/BarButtonItem.h"
 #include "platform/ui/ObserverSlot.h"
 #include "platform/ui/PopoverAnchor.h"
@@ -17,7 +18,6 @@ namespace platform::ui {
 
 class NavigationController;
 class NavigationItem;
-class StateCoder;
 class TransitionCoordinator;
 class View;
 class ViewControllerVisitor;
