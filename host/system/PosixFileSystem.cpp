@@ -5,6 +5,7 @@
 #include "host/system/SystemErrors.h"
 
 #include <fcntl.h>
+#include <glib.h>
 #include <sys/stat.h>
 #include <sys/xattr.h>
 
@@ -74,6 +75,13 @@ std::optional<FileType> PosixFileSystem::typeOfItem(const std::string& path) con
     if (holdsNul(path) || ::stat(path.c_str(), &found) != 0)
         return std::nullopt;
     return fileType(found.st_mode);
+}
+
+std::optional<platform::Url> PosixFileSystem::userDocumentsFolder() const
+{
+    const char* folder = g_get_user_special_dir(G_USER_DIRECTORY_DOCUMENTS);
+    return folder ? std::optional(platform::Url::fileURL(folder, platform::PathKind::Directory))
+                  : std::nullopt;
 }
 
 void PosixFileSystem::enumerateDeeply(const platform::Url& folder,

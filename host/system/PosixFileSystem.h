@@ -11,6 +11,7 @@ public:
     platform::Result<platform::FileAttributes> attributesOfItem(const std::string& path) const override;
     platform::Result<std::string> destinationOfSymbolicLink(const std::string& path) const override;
     std::optional<platform::FileType> typeOfItem(const std::string& path) const override;
+    std::optional<platform::Url> userDocumentsFolder() const override;
     void enumerateDeeply(const platform::Url& folder,
         const std::function<Continue(const platform::Url&, platform::FileType)>& entry,
         const std::function<Continue(const platform::Url&, const platform::Error&)>& error) const override;
