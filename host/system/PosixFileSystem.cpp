@@ -79,9 +79,11 @@ std::optional<FileType> PosixFileSystem::typeOfItem(const std::string& path) con
 
 std::optional<platform::Url> PosixFileSystem::userDocumentsFolder() const
 {
-    const char* folder = g_get_user_special_dir(G_USER_DIRECTORY_DOCUMENTS);
-    return folder ? std::optional(platform::Url::fileURL(folder, platform::PathKind::Directory))
-                  : std::nullopt;
+    const char* path = g_get_user_special_dir(G_USER_DIRECTORY_DOCUMENTS);
+    // A user without such a folder has the home folder entered in its place.
+    if (!path || std::string_view(path) == g_get_home_dir())
+        return std::nullopt;
+    return platform::Url::fileURL(path, platform::PathKind::Directory);
 }
 
 void PosixFileSystem::enumerateDeeply(const platform::Url& folder,
