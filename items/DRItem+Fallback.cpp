@@ -1,4 +1,5 @@
 #include "items/DRItem.h"
+#include "items/UrlResolution.h"
 
 #include "platform/FileSystem.h"
 #include "platform/TypeRegistry.h"
@@ -85,7 +86,7 @@ std::uint64_t DRItem::sizeOfPackage(const std::optional<Url>& url)
     services().fileSystem().enumerateDeeply(
         *url,
         [&](const Url& entry, platform::FileType) {
-            sum += promisedSize(entry);
+            sum += promisedSize(trw_URLByResolvingPromise(entry));
             return Continue::Yes;
         },
         [](const Url& entry, const Error& error) {

@@ -44,6 +44,8 @@ bool hasEncodedSlash(std::string_view text)
 
 std::string withoutExtraSlashes(std::string_view path)
 {
+    if (path.find("//") == std::string_view::npos && (path.size() < 2 || path.back() != '/'))
+        return std::string(path);
     std::string out;
     out.reserve(path.size());
     for (const char c : path) {
@@ -76,6 +78,12 @@ std::optional<std::vector<QueryItem>> parseQuery(std::string_view text)
         items.push_back({std::move(*name), hasValue ? std::optional(std::move(*value)) : std::nullopt});
     }
     return items;
+}
+
+std::string_view lastName(std::string_view path)
+{
+    const auto slash = path.rfind('/');
+    return path == "/" || slash == std::string_view::npos ? path : path.substr(slash + 1);
 }
 
 std::string fileText(std::string_view path, PathKind kind)
@@ -149,24 +157,24 @@ std::vector<std::string> Url::pathComponents() const
 
 std::string Url::lastPathComponent() const
 {
-    const auto slash = path().rfind('/');
-    return path() == "/" || slash == std::string::npos ? path() : path().substr(slash + 1);
+    return std::string(lastName(path()));
 }
 
 std::string Url::pathExtension() const
 {
-    const auto name = lastPathComponent();
+    const auto name = lastName(path());
     const auto dot = name.rfind('.');
-    if (dot == std::string::npos || dot == 0 || name.find(' ', dot) != std::string::npos)
+    if (dot == std::string_view::npos || dot == 0 || name.find(' ', dot) != std::string_view::npos)
         return {};
-    return name.substr(dot + 1);
+    return std::string(name.substr(dot + 1));
 }
 
 Url Url::deletingLastPathComponent() const
 {
-    const auto slash = path().rfind('/');
+    const std::string_view whole = path();
+    const auto slash = whole.rfind('/');
     return fileURL(
-        slash == 0 || slash == std::string::npos ? "/" : path().substr(0, slash), PathKind::Directory);
+        slash == 0 || slash == std::string_view::npos ? "/" : whole.substr(0, slash), PathKind::Directory);
 }
 
 Url Url::appendingPathComponent(std::string_view name, PathKind kind) const
