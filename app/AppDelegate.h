@@ -1,0 +1,65 @@
+#pragma once
+
+#include "platform/Application.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace platform::ui {
+class Window;
+}
+
+namespace tarrow {
+
+class NavController;
+
+/// Makes the one window with the browser, and leads everything that enters the application from outside to
+/// it. Made with std::make_shared. Main thread only.
+class AppDelegate : public platform::ApplicationDelegate, public std::enable_shared_from_this<AppDelegate> {
+public:
+    /// Null before the launch.
+    const std::shared_ptr<platform::ui::Window>& rootWindow() const { return _rootWindow; }
+    void setRootWindow(std::shared_ptr<platform::ui::Window> window) { _rootWindow = std::move(window); }
+
+    bool applicationWillFinishLaunchingWithOptions(
+        platform::Application& application, const platform::LaunchOptions& options) override;
+    bool applicationDidFinishLaunchingWithOptions(
+        platform::Application& application, const platform::LaunchOptions& options) override;
+    void applicationWillResignActive(platform::Application& application) override;
+    /// State is kept and restored only while somebody is signed in.
+    bool applicationShouldSaveApplicationState(
+        platform::Application& application, platform::StateCoder& coder) override;
+    bool applicationShouldRestoreApplicationState(
+        platform::Application& application, platform::StateCoder& coder) override;
+    bool applicationOpenURLOptions(platform::Application& application, const std::string& url,
+        const platform::PropertyDictionary& options) override;
+    /// The completion is not called.
+    void applicationPerformActionForShortcutItemCompletionHandler(platform::Application& application,
+        const platform::ShortcutItem& shortcut, const ShortcutCompletion& completion) override;
+    bool applicationWillContinueUserActivityWithType(
+        platform::Application& application, const std::string& type) override;
+    /// The handler is not called.
+    bool applicationContinueUserActivityRestorationHandler(platform::Application& application,
+        const platform::UserActivity& activity, const RestorationHandler& handler) override;
+    void applicationDidFailToContinueUserActivityWithTypeError(
+        platform::Application& application, const std::string& type, const platform::Error& error) override;
+
+private:
+    /// The window's root when it is the browser; else null, and nothing is led anywhere.
+    std::shared_ptr<NavController> browser() const;
+    bool isSignedIn() const;
+    bool warpTo(const std::optional<platform::Url>& url, int previewMode);
+    void warpLater(const platform::Url& url);
+    void openRecentDocument(const platform::PropertyDictionary& information);
+    void continueSearch(const platform::UserActivity& activity);
+    void openSearchResult(const platform::UserActivity& activity);
+    void openHandedOverDocument(const platform::UserActivity& activity);
+
+    std::shared_ptr<platform::ui::Window> _rootWindow;
+};
+
+/// Logs one line at each level. For diagnosis; nothing calls it.
+void _TarrowDriveLogTest(); // NOLINT(bugprone-reserved-identifier): called by this name from a debugger
+
+} // namespace tarrow

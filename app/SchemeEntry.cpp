@@ -1,0 +1,46 @@
+#include "app/SchemeEntry.h"
+
+#include "items/UrlResolution.h"
+#include "preview/PreviewMode.h"
+
+namespace tarrow {
+
+namespace {
+
+constexpr std::string_view applicationScheme = "tarrowdriveapp";
+
+std::optional<Url> targetOf(const Url& url)
+{
+    // The URL has undone the first encoding already.
+    const auto path = platform::percentDecoded(url.path());
+    if (!path || !path->starts_with('/'))
+        return std::nullopt;
+    return trw_URLByResolvingBookmark(Url::fileURL(*path));
+}
+
+int previewModeOf(const Url& url)
+{
+    int mode = PreviewModeQuick;
+    for (const auto& item : url.queryItems()) {
+        if (platform::percentDecoded(item.name) != "mode")
+            continue;
+        const auto value = platform::percentDecoded(item.value.value_or(""));
+        if (value == "preview")
+            mode = PreviewModeQuick;
+        else if (value == "details" || value == "info")
+            mode = PreviewModeDetails;
+    }
+    return mode;
+}
+
+} // namespace
+
+std::optional<SchemeEntry> SchemeEntry::parse(std::string_view text)
+{
+    const auto url = Url::parse(text);
+    if (!url || url->scheme() != applicationScheme)
+        return std::nullopt;
+    return SchemeEntry{targetOf(*url), previewModeOf(*url)};
+}
+
+} // namespace tarrow

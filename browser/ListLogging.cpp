@@ -1,0 +1,45 @@
+#include "browser/ListLogging.h"
+
+#include "items/FileUtils.h"
+#include "platform/Log.h"
+#include "platform/components/DocumentListController.h"
+
+namespace tarrow {
+
+namespace {
+
+/// An item's path, with all that leads to the list's folder left out.
+std::string shortPath(const Url& item, const std::optional<Url>& folder)
+{
+    const auto& path = item.path();
+    const auto leading = folder ? folder->deletingLastPathComponent().path() : std::string();
+    return leading.size() > 1 && path.starts_with(leading) ? "..." + path.substr(leading.size()) : path;
+}
+
+} // namespace
+
+std::string logText(const ContainedItems& items)
+{
+    return items.list ? platform::logText(items.list->containedItems()) : "(null)";
+}
+
+std::string logText(const PresentedType& type)
+{
+    const auto value =
+        FileUtils::getResourceValueForURL(AttributeKey::TypeIdentifier, type.list->presentedURL());
+    const auto* text = value ? std::get_if<std::string>(&*value) : nullptr;
+    return text ? *text : "(null)";
+}
+
+void logNewList(const std::shared_ptr<const platform::components::DocumentListController>& list)
+{
+    static constexpr Operation op{"-[NavController initNewListController:]"};
+    op.debug("New DLC (%d items): \"%@\", UTI=%@, URL=%@", list->containedItemCount(), list->title(),
+        PresentedType{list}, list->presentedURL());
+    if (!Operation::isWritten(platform::LogLevel::Debug))
+        return;
+    for (const auto& item : list->containedItems())
+        op.debug("    %@", shortPath(item, list->presentedURL()));
+}
+
+} // namespace tarrow

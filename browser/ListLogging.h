@@ -1,0 +1,30 @@
+#pragma once
+
+#include <memory>
+#include <string>
+
+namespace platform::components {
+class DocumentListController;
+}
+
+namespace tarrow {
+
+// What log lines say about a folder list. The texts are only made when the line is written, because a list
+// may have 100,000 items.
+
+/// Reads as the URLs of a list's items; the list may be null.
+struct ContainedItems {
+    std::shared_ptr<const platform::components::DocumentListController> list;
+};
+std::string logText(const ContainedItems& items);
+
+/// Reads as the content type of the folder that a list shows.
+struct PresentedType {
+    std::shared_ptr<const platform::components::DocumentListController> list;
+};
+std::string logText(const PresentedType& type);
+
+/// Logs a list that is about to be shown and, line by line, its items.
+void logNewList(const std::shared_ptr<const platform::components::DocumentListController>& list);
+
+} // namespace tarrow

@@ -1,0 +1,330 @@
+// The ways through the drive: taps, links, jumps from outside, search, peek and pop.
+
+#include "browser/NavController.h"
+#include "browser/PeekFolderViewController.h"
+#include "items/DRItem.h"
+#include "items/UrlResolution.h"
+#include "platform/CloudDocumentService.h"
+#include "platform/Dispatch.h"
+#include "platform/Localization.h"
+#include "platform/Log.h"
+#include "platform/Services.h"
+#include "platform/components/DocumentListController.h"
+#include "platform/ui/SearchPresentation.h"
+#include "preview/LookwellItemController.h"
+#include "preview/PreviewItemManager.h"
+#include "prompts/UIUtils.h"
+
+#include <array>
+
+namespace tarrow {
+
+using platform::components::DocumentListAction;
+using platform::components::DocumentListController;
+
+namespace {
+
+/// The stack needs this long to settle before the search field can take the keyboard.
+constexpr auto searchDelay = std::chrono::milliseconds(700);
+
+const platform::CloudItems& cloudItems()
+{
+    return services().cloudDocumentService().items();
+}
+
+bool isInDocumentsArea(const std::optional<Url>& url)
+{
+    return url && cloudItems().isInDocumentsArea(*url);
+}
+
+std::string described(const std::shared_ptr<DRItem>& item)
+{
+    return item ? item->description() : "(null)";
+}
+
+/// What a symbolic link leads to, one step further, when both ends lie in the drive's documents; else null.
+std::shared_ptr<DRItem> followLink(const DRItem& link, const Operation& op)
+{
+    const auto& target = link.resolvedURL();
+    if (!isInDocumentsArea(target)) {
+        op.debug("DLC Selection is symlink to outside target: %@", target);
+        return nullptr;
+    }
+    auto item = DRItem::initWithURL(*target);
+    if (!item) {
+        op.debug("DLC Selection is symlink that didn't resolve to valid target: %@", target);
+        return nullptr;
+    }
+    if (!isInDocumentsArea(item->resolvedURL())) {
+        op.debug("DLC Selection is symlink to invalid target: %@", item->resolvedURL());
+        return nullptr;
+    }
+    return item;
+}
+
+std::vector<NavController::Screen> screens(const PreviewItemManager::ListStack& lists)
+{
+    return {lists.begin(), lists.end()};
+}
+
+Error vanished(const Url& url)
+{
+    return Error(FileErrorCode::NoSuchFile,
+        {{std::string(platform::errorKey::localizedDescription),
+             platform::localized("“%@” is no longer there.", {url.lastPathComponent()})},
+            {std::string(platform::errorKey::filePath), url.path()}});
+}
+
+} // namespace
+
+NavController::List NavController::getTopDocumentListController() const
+{
+    static constexpr Operation op{"-[NavController getTopDocumentListController]"};
+    const auto top = topViewController();
+    if (!top)
+        op.warning("ERROR: topViewController is nil");
+    return std::dynamic_pointer_cast<DocumentListController>(top);
+}
+
+void NavController::navigationControllerDidShowViewControllerAnimated(
+    NavigationController&, const Screen& screen, bool)
+{
+    const auto list = std::dynamic_pointer_cast<DocumentListController>(screen);
+    if (!list)
+        return;
+    dropItemManager();
+    updateStatusUI(list);
+    initNewListController(list);
+    setToolbarHidden(false);
+}
+
+void NavController::dropItemManager()
+{
+    if (_itemManager)
+        _itemManager->unregisterAsFilePresenter();
+    _itemManager = nullptr;
+}
+
+void NavController::replaceItemManager(int mode)
+{
+    dropItemManager();
+    _itemManager = PreviewItemManager::newItemManagerWithModeNavController(mode, self());
+}
+
+void NavController::showPreviewPreviewMode(const std::shared_ptr<DRItem>& item, int mode)
+{
+    if (!item)
+        return;
+    replaceItemManager(mode);
+    // The manager is kept by this call too: showing its screen may replace it.
+    const auto manager = _itemManager;
+    manager->previewItem(item);
+}
+
+bool NavController::isSearchPresented() const
+{
+    return std::dynamic_pointer_cast<platform::ui::SearchPresentation>(presentedViewController()) != nullptr;
+}
+
+void NavController::dismissPresentedScreen()
+{
+    if (presentedViewController())
+        dismissViewController(false);
+}
+
+bool NavController::warpToNewURLPreviewMode(const std::optional<Url>& url, int mode)
+{
+    static constexpr Operation op{"-[NavController warpToNewURL:previewMode:]"};
+    dismissPresentedScreen();
+    if (!url)
+        return false;
+    if (!cloudItems().isInDocumentsArea(*url)) {
+        op.debug("Preview URL is not in the Mobile Documents dir: %@", *url);
+        return false;
+    }
+    if (cloudItems().isInTrash(*url)) {
+        op.debug("Preview URL is in Trash: %@", *url);
+        return false;
+    }
+    const auto resolved = trw_URLByResolvingPromise(*url);
+    replaceItemManager(mode);
+    const auto manager = _itemManager;
+    const bool warped = manager->warpToNewURL(resolved);
+    if (!warped)
+        op.warning("warpToNewURL failed: %@", resolved);
+    return warped;
+}
+
+bool NavController::warpToFolderForURL(const Url& url)
+{
+    const auto stack = PreviewItemManager::dlcStackForURL(url);
+    if (stack)
+        setViewControllers(screens(*stack), false);
+    return stack.has_value();
+}
+
+void NavController::startSearch(const std::string& query)
+{
+    dismissPresentedScreen();
+    popToRootViewController(false);
+    auto& dispatch = services().dispatch();
+    dispatch.after(searchDelay, dispatch.mainQueue(), [weak = std::weak_ptr(self()), query] {
+        const auto browser = weak.lock();
+        if (const auto list = browser ? browser->getTopDocumentListController() : nullptr)
+            list->startSearchWithQueryStringBecomeFirstResponder(query, true);
+    });
+}
+
+void NavController::documentListControllerDidSelectContainerWithViewController(
+    const List&, const List& container)
+{
+    static constexpr Operation op{
+        "-[NavController documentListController:didSelectContainerWithViewController:]"};
+    op.userAction("Selected Folder (dlc)");
+    if (!container || !container->presentedURL()) {
+        op.warning("New DLC is nil");
+        return;
+    }
+    op.info("User selected folder %@", *container->presentedURL());
+    if (isSearchPresented()) {
+        dismissViewController(true);
+        // What was found is shown in its real place in the drive.
+        if (warpToFolderForURL(*container->presentedURL()))
+            return;
+    }
+    initNewListController(container);
+    pushViewController(container, true);
+}
+
+void NavController::documentListControllerDidSelectItemAtURL(const List&, const Url& url)
+{
+    static constexpr Operation op{"-[NavController documentListController:didSelectItemAtURL:]"};
+    op.userAction("Selected Item (dlc)");
+    op.info("Picked URL: %@", url);
+    auto item = DRItem::initWithURL(url);
+    op.debug("DRItem: %@ (%{public}@ bytes %{public}@)", described(item),
+        item ? item->fileSize() : std::nullopt, url.pathExtension());
+    if (!item) {
+        showVanishedItem(url);
+        return;
+    }
+    if (item->isSymlink())
+        item = followLink(*item, op);
+    if (!item)
+        return;
+    if (item->isDirectory()) {
+        op.debug("Building DLC stack for symlink to %@", item->url());
+        openFolder(item->url(), op);
+    } else {
+        openDocument(item);
+    }
+}
+
+void NavController::showVanishedItem(const Url& url)
+{
+    const auto top = topViewController();
+    UIUtils::showErrorParentViewController(vanished(url), top ? top : self());
+    // Later, so that the list ends its handling of the tap first.
+    services().dispatch().mainQueue()->async([weak = std::weak_ptr(self())] {
+        if (const auto browser = weak.lock())
+            browser->setupInitialViewController();
+    });
+}
+
+void NavController::openFolder(const Url& url, const Operation& op)
+{
+    if (const auto stack = PreviewItemManager::dlcStackForURL(url))
+        setViewControllers(screens(*stack), true);
+    else
+        op.error("Couldn't build DLC stack for %@. Not switching to folder", url);
+}
+
+void NavController::openDocument(const std::shared_ptr<DRItem>& item)
+{
+    // Later, so that the list ends its handling of the tap first.
+    services().dispatch().mainQueue()->async([weak = std::weak_ptr(self()), item] {
+        if (const auto browser = weak.lock())
+            browser->showPreviewPreviewMode(item, item->canPreview() ? PreviewModeQuick : PreviewModeDetails);
+    });
+}
+
+void NavController::documentListControllerItemsChanged(const List& list)
+{
+    static constexpr Operation op{"-[NavController documentListControllerItemsChanged:]"};
+    static std::size_t lastLoggedCount = 0;
+    _pickerIsAlive = true;
+    if (list != topViewController())
+        return;
+    if (const auto count = list->containedItemCount(); count != lastLoggedCount) {
+        lastLoggedCount = count;
+        op.debug("DLC items changed, count is %{public}@", count);
+    }
+    updateStatusUI(list);
+}
+
+void NavController::documentListControllerURLWasRemoved(const List&)
+{
+    popViewController(true);
+}
+
+NavController::Screen NavController::documentListControllerViewControllerForPreviewingItemAtURL(
+    const List&, const Url& url)
+{
+    static constexpr Operation op{
+        "-[NavController documentListController:viewControllerForPreviewingItemAtURL:]"};
+    op.userAction("DLC Action Firmtap Peek");
+    op.debug("DLC asking for PeekVC for %@", url);
+    constexpr std::array keys{
+        AttributeKey::IsPackage, AttributeKey::IsRegularFile, AttributeKey::IsDirectory};
+    const auto values =
+        services().cloudDocumentService().promisedItems().promisedItemResourceValues(url, keys).value;
+    if (values && (values->flag(AttributeKey::IsPackage) || values->flag(AttributeKey::IsRegularFile))) {
+        _itemManager = PreviewItemManager::newItemManagerWithModeNavController(PreviewModeQuick, self());
+        return _itemManager->prepareToPreviewItem(DRItem::initWithURL(url));
+    }
+    if (values && values->flag(AttributeKey::IsDirectory))
+        return PeekFolderViewController::initWithURL(url);
+    op.debug("URL is not a regular file, package, or folder");
+    return nullptr;
+}
+
+void NavController::documentListControllerPerformActionURLOriginatingViewCompletion(const List&, int action,
+    const Url& url, const std::shared_ptr<platform::ui::View>&, const Completion& completion)
+{
+    static constexpr Operation op{
+        "-[NavController documentListController:performAction:URL:originatingView:completion:]"};
+    if (action != static_cast<int>(DocumentListAction::PressurePop)) {
+        op.error("performAction:%{public}@ -- unexpected value", action);
+        if (completion)
+            completion();
+        return;
+    }
+    op.userAction("DLC Action Firmtap Pop");
+    op.info("Preview action: %@", url);
+    if (completion)
+        completion();
+    knopPopToURL(url);
+}
+
+void NavController::knopPopToURL(const Url& url)
+{
+    static constexpr Operation op{"-[NavController knopPopToURL:]"};
+    const bool searching = isSearchPresented();
+    if (searching)
+        dismissViewController(true);
+    const auto item = DRItem::initWithURL(url);
+    if (!item)
+        return;
+    if (item->isDirectory()) {
+        op.debug("Building DLC stack for Firmtap of %@", item->url());
+        openFolder(item->url(), op);
+        return;
+    }
+    const auto preview = _itemManager ? _itemManager->currentLookwellController() : nullptr;
+    if (searching)
+        warpToFolderForURL(url);
+    if (preview)
+        pushViewController(preview, true);
+}
+
+} // namespace tarrow

@@ -1,0 +1,261 @@
+#include "browser/NavController.h"
+
+#include "browser/ListLogging.h"
+#include "items/DRItem.h"
+#include "platform/CloudDocumentService.h"
+#include "platform/Dispatch.h"
+#include "platform/Formatters.h"
+#include "platform/Localization.h"
+#include "platform/Log.h"
+#include "platform/Services.h"
+#include "platform/StateCoder.h"
+#include "platform/StorageOffers.h"
+#include "platform/UserDefaults.h"
+#include "platform/components/DocumentListController.h"
+#include "platform/components/UnavailableScreen.h"
+#include "platform/components/UpgradeFlow.h"
+#include "platform/ui/View.h"
+#include "preview/PreviewItemManager.h"
+#include "prompts/UIUtils.h"
+
+namespace tarrow {
+
+using platform::Notification;
+using platform::components::DocumentListController;
+using platform::components::UnavailableScreen;
+using platform::components::UpgradeFlow;
+
+namespace {
+
+constexpr auto tokenKey = "TarrowDriveAppID.UbiquityIdentityToken";
+constexpr double quotaInterval = 300.0; // seconds
+constexpr auto stateURLKey = "url";
+constexpr auto stateModeKey = "PreviewMode";
+
+std::optional<PropertyValue> currentToken()
+{
+    return services().cloudDocumentService().account().identityToken();
+}
+
+std::string levelText(const std::shared_ptr<const platform::StorageOffer>& offer)
+{
+    return offer ? std::to_string(offer->level) : "not set";
+}
+
+} // namespace
+
+NavController::~NavController() = default;
+
+std::shared_ptr<NavController> NavController::self()
+{
+    return std::static_pointer_cast<NavController>(shared_from_this());
+}
+
+void NavController::viewDidLoad()
+{
+    static constexpr Operation op{"-[NavController viewDidLoad]"};
+    setDelegate(self());
+    observeAccount();
+    setupInitialViewController();
+    NavigationController::viewDidLoad();
+    _observations.push_back(services().notificationCenter().observe(
+        Notification::StorageOfferDidChange, [weak = std::weak_ptr(self())](const auto&) {
+            if (const auto browser = weak.lock())
+                browser->offerChangedNotification();
+        }));
+    auto& offers = services().storageOfferManager();
+    if (!offers.fetchOfferIfNeeded())
+        _upgradeOffer = offers.currentOffer();
+    op.info("Quota Offer level is %{public}@", levelText(_upgradeOffer));
+}
+
+void NavController::observeAccount()
+{
+    auto& center = services().notificationCenter();
+    _observations.push_back(
+        center.observe(Notification::ApplicationDidBecomeActive, [weak = std::weak_ptr(self())](const auto&) {
+            if (const auto browser = weak.lock())
+                browser->didBecomeActiveNotification();
+        }));
+    _observations.push_back(
+        center.observe(Notification::CloudIdentityDidChange, [weak = std::weak_ptr(self())](const auto&) {
+            if (const auto browser = weak.lock())
+                browser->tarrowAccountAvailabilityChanged();
+        }));
+}
+
+bool NavController::checkTarrowState() const
+{
+    return currentToken().has_value();
+}
+
+void NavController::setupInitialViewController()
+{
+    static constexpr Operation op{"-[NavController setupInitialViewController]"};
+    _pickerIsAlive = false;
+    if (checkTarrowState()) {
+        op.debug("Tarrow is enabled");
+        setupDrive();
+    } else {
+        op.warning("Tarrow is not enabled");
+        setupUnavailableScreen();
+    }
+    op.debug("%{public}@ viewDidLoad", "NavController");
+}
+
+void NavController::setupDrive()
+{
+    static constexpr Operation op{"-[NavController setupInitialViewController]"};
+    setToolbarHidden(false);
+    const auto root = DocumentListController::createRootList();
+    op.debug("Contained items: %@", ContainedItems{root});
+    if (root) {
+        initNewListController(root);
+        setViewControllers({root}, false);
+    } else {
+        op.error("_FolderListScreen creation failed");
+    }
+    _quotaFetcher = QuotaFetcher::init();
+    _quotaFetcher->setDelegate(self());
+    _quotaFetcher->runWithInterval(quotaInterval);
+}
+
+void NavController::setupUnavailableScreen()
+{
+    static constexpr Operation op{"-[NavController setupInitialViewController]"};
+    if (const auto screen = UnavailableScreen::create()) {
+        setViewControllers({screen}, false);
+    } else {
+        op.error("_DriveUnavailableScreen creation failed");
+        // Later, so that the alert comes after whatever the caller still does to the stack.
+        services().dispatch().mainQueue()->async([weak = std::weak_ptr(self())] {
+            UIUtils::showAlertMessageParentViewController(
+                {}, platform::localized("Tarrow is not enabled"), weak.lock());
+        });
+    }
+    dropItemManager();
+    setToolbarHidden(true);
+    _quotaFetcher = nullptr;
+    _quotaBytes = 0;
+}
+
+void NavController::didBecomeActiveNotification()
+{
+    static constexpr Operation op{"-[NavController didBecomeActiveNotification:]"};
+    op.info("Got HostDidActivateEvent (nav)");
+    handleAccountChanges();
+}
+
+void NavController::tarrowAccountAvailabilityChanged()
+{
+    static constexpr Operation op{"-[NavController tarrowAccountAvailabilityChanged:]"};
+    op.info("Tarrow account availability changed");
+    handleAccountChanges();
+}
+
+void NavController::handleAccountChanges()
+{
+    static constexpr Operation op{"-[NavController handleAccountChanges]"};
+    const auto token = currentToken();
+    if (storedToken() == token) {
+        op.debug("Tarrow Token Matches");
+        return;
+    }
+    op.info("Tarrow Token Changed, enabled=%{public}@, reinitializing view", token ? "YES" : "NO");
+    saveTarrowToken(token);
+    setupInitialViewController();
+}
+
+std::optional<PropertyValue> NavController::storedToken() const
+{
+    const auto data = services().userDefaults().data(tokenKey);
+    return data ? services().keyedArchiver().unarchive(*data) : std::nullopt;
+}
+
+void NavController::saveTarrowToken(const std::optional<PropertyValue>& token)
+{
+    if (token)
+        services().userDefaults().setData(tokenKey, services().keyedArchiver().archive(*token));
+    else
+        services().userDefaults().remove(tokenKey);
+}
+
+void NavController::quotaFetcherDidUpdateValue(QuotaFetcher&, std::uint64_t freeBytes)
+{
+    static constexpr Operation op{"-[NavController quotaFetcher:didUpdateValue:]"};
+    _quotaBytes = freeBytes;
+    _lastQuotaFetch = services().dispatch().now();
+    op.debug("updated quota at %{public}@: %{public}@ bytes avail", *_lastQuotaFetch, freeBytes);
+    updateStatusUI(nullptr);
+}
+
+void NavController::offerChangedNotification()
+{
+    static constexpr Operation op{"-[NavController offerChangedNotification:]"};
+    _upgradeOffer = services().storageOfferManager().currentOffer();
+    op.info("Quota Offer Changed, offer level is %{public}@", levelText(_upgradeOffer));
+    updateStatusUI(nullptr);
+    for (const auto& screen : viewControllers()) {
+        const auto list = std::dynamic_pointer_cast<DocumentListController>(screen);
+        if (const auto bar = list ? statusBar(*list) : nullptr)
+            bar->showUpgradeOffer(_upgradeOffer);
+    }
+    // More storage that was just bought shows up in the quota with some delay.
+    for (const int seconds : {1, 5, 20})
+        fetchQuotaAfter(seconds);
+}
+
+void NavController::fetchQuotaAfter(int seconds)
+{
+    auto& dispatch = services().dispatch();
+    dispatch.after(std::chrono::seconds(seconds), dispatch.mainQueue(), [weak = std::weak_ptr(self())] {
+        const auto browser = weak.lock();
+        if (browser && browser->quotaFetcher())
+            browser->quotaFetcher()->fetchNow();
+    });
+}
+
+void NavController::upgradeStorageButtonPressed()
+{
+    static constexpr Operation op{"-[NavController upgradeStorageButtonPressed]"};
+    _upgradeFlowMgr = UpgradeFlow::initWithOffer(_upgradeOffer);
+    if (!_upgradeOffer) {
+        op.info("UpgradeStorage: No upgrade offer");
+        return;
+    }
+    op.info("UpgradeStorage: presenting view controller");
+    _upgradeFlowMgr->beginWithPresentingViewController(topViewController());
+}
+
+void NavController::encodeRestorableStateWithCoder(platform::StateCoder& coder)
+{
+    NavigationController::encodeRestorableStateWithCoder(coder);
+    if (!_itemManager || !_itemManager->item())
+        return;
+    coder.encode(stateURLKey, _itemManager->item()->url());
+    coder.encode(stateModeKey, _itemManager->mode());
+}
+
+void NavController::decodeRestorableStateWithCoder(const platform::StateCoder& coder)
+{
+    NavigationController::decodeRestorableStateWithCoder(coder);
+    const auto* value = coder.decode(stateURLKey);
+    const auto* url = value ? value->get<Url>() : nullptr;
+    const auto item = url ? DRItem::initWithURL(*url) : nullptr;
+    if (!item || item->isDirectory())
+        return;
+    const auto* mode = coder.decode(stateModeKey);
+    const auto integer = mode ? mode->asInteger() : std::nullopt;
+    showPreviewPreviewMode(item, static_cast<int>(integer.value_or(PreviewModeQuick)));
+}
+
+void NavController::logContainerURL() const
+{
+    static constexpr Operation op{"-[NavController logContainerURL]"};
+    if (const auto url = services().cloudDocumentService().containers().defaultContainerURL())
+        op.debug("Tarrow container is at %{public}@", *url);
+    else
+        op.debug("Tarrow is not available");
+}
+
+} // namespace tarrow

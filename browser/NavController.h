@@ -1,0 +1,156 @@
+#pragma once
+
+#include "platform/Date.h"
+#include "platform/NotificationCenter.h"
+#include "platform/components/DocumentListControllerDelegate.h"
+#include "platform/ui/NavigationController.h"
+#include "prompts/DocumentListControllerStatusBar.h"
+#include "prompts/QuotaFetcher.h"
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace platform {
+class Operation;
+class PropertyValue;
+} // namespace platform
+namespace platform::components {
+class UpgradeFlow;
+}
+
+namespace tarrow {
+
+class DRItem;
+class PreviewItemManager;
+
+/// The browser: a stack of the drive's folder lists with a preview on top of them, or the screen that says
+/// that the drive is not available. It follows the cloud account and keeps the line under each list up to
+/// date. Made with std::make_shared. Main thread only.
+class NavController : public platform::ui::NavigationController,
+                      public platform::ui::NavigationControllerDelegate,
+                      public platform::components::DocumentListControllerDelegate,
+                      public QuotaFetcherDelegate,
+                      public DocumentListControllerStatusBarDelegate {
+public:
+    using Screen = std::shared_ptr<platform::ui::ViewController>;
+
+    ~NavController() override;
+
+    /// Whether a list has reported its contents since the last set-up; the status line waits for that.
+    bool pickerIsAlive() const { return _pickerIsAlive; }
+    /// An enclosing split view, for its owner's use; null: none.
+    Screen splitViewController() const { return _splitViewController.lock(); }
+    void setSplitViewController(const Screen& screen) { _splitViewController = screen; }
+    /// The title of the list that was configured last.
+    const std::string& viewTitle() const { return _viewTitle; }
+    /// When the free storage was heard of last; nothing before that.
+    const std::optional<platform::Date>& lastQuotaFetch() const { return _lastQuotaFetch; }
+    /// Null while the drive is not available.
+    const std::shared_ptr<QuotaFetcher>& quotaFetcher() const { return _quotaFetcher; }
+    /// The manager of the current preview; null while a folder list is on top.
+    const std::shared_ptr<PreviewItemManager>& itemManager() const { return _itemManager; }
+    /// The storage upgrade that was started last.
+    const std::shared_ptr<platform::components::UpgradeFlow>& upgradeFlowMgr() const
+    {
+        return _upgradeFlowMgr;
+    }
+    /// Null: no offer.
+    const std::shared_ptr<const platform::StorageOffer>& upgradeOffer() const { return _upgradeOffer; }
+    /// Free storage in bytes; 0 while the drive is not available.
+    std::uint64_t quotaBytes() const { return _quotaBytes; }
+
+    // Set-up and account.
+    void viewDidLoad() override;
+    /// Shows the drive's top level, or that the drive is not available; whatever was shown before is gone.
+    void setupInitialViewController();
+    /// Whether somebody is signed in.
+    bool checkTarrowState() const;
+    /// Sets the browser up again when the account is not the one of the last time.
+    void handleAccountChanges();
+    /// Keeps the account's token for the next time; nothing: signed out.
+    void saveTarrowToken(const std::optional<platform::PropertyValue>& token);
+    void didBecomeActiveNotification();
+    void tarrowAccountAvailabilityChanged();
+    void offerChangedNotification();
+    void upgradeStorageButtonPressed() override;
+    void quotaFetcherDidUpdateValue(QuotaFetcher& fetcher, std::uint64_t freeBytes) override;
+    /// Logs where the default container lies. For diagnosis; nothing calls it.
+    void logContainerURL() const;
+
+    // Lists and their status line.
+    /// The screen on top when it is a folder list; else null.
+    List getTopDocumentListController() const;
+    /// Configures a list that is about to be shown.
+    void initNewListController(const List& list);
+    void configureNavBar(const List& list);
+    void configureToolbar(const List& list);
+    /// Brings the status line of a list (null: the one on top) up to date.
+    void updateStatusUI(const List& list);
+    /// The number of items and, once it is known, the free storage.
+    std::string toolbarStatusText(std::size_t itemCount) const;
+    std::string quotaAvailableString() const;
+    bool okToShowQuota() const { return _lastQuotaFetch.has_value(); }
+
+    // Saved state: the previewed item and its preview mode.
+    void encodeRestorableStateWithCoder(platform::StateCoder& coder) override;
+    void decodeRestorableStateWithCoder(const platform::StateCoder& coder) override;
+
+    // Navigation.
+    void navigationControllerDidShowViewControllerAnimated(
+        NavigationController&, const Screen& screen, bool animated) override;
+    /// Replaces the whole stack by the way to an item of the drive and, for a document, its preview. False,
+    /// and the stack stays, for no URL, one outside the drive's documents or in its trash, and one without a
+    /// way to it.
+    bool warpToNewURLPreviewMode(const std::optional<platform::Url>& url, int mode);
+    /// Replaces the whole stack by the lists that lead to a folder; false, and it stays, when none do.
+    bool warpToFolderForURL(const platform::Url& url);
+    /// Shows an item in a preview; null does nothing.
+    void showPreviewPreviewMode(const std::shared_ptr<DRItem>& item, int mode);
+    /// Goes back to the top level and opens its search field with a query.
+    void startSearch(const std::string& query);
+    /// Opens the item of a peek.
+    void knopPopToURL(const platform::Url& url);
+
+    // What a folder list reports.
+    void documentListControllerDidSelectContainerWithViewController(
+        const List& list, const List& container) override;
+    void documentListControllerDidSelectItemAtURL(const List& list, const platform::Url& url) override;
+    void documentListControllerItemsChanged(const List& list) override;
+    void documentListControllerURLWasRemoved(const List& list) override;
+    Screen documentListControllerViewControllerForPreviewingItemAtURL(
+        const List& list, const platform::Url& url) override;
+    void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,
+        const platform::Url& url, const std::shared_ptr<platform::ui::View>& originatingView,
+        const Completion& completion) override;
+
+private:
+    std::shared_ptr<NavController> self();
+    void setupDrive();
+    void setupUnavailableScreen();
+    void observeAccount();
+    std::optional<platform::PropertyValue> storedToken() const;
+    void fetchQuotaAfter(int seconds);
+    void replaceItemManager(int mode);
+    void dropItemManager();
+    void dismissPresentedScreen();
+    bool isSearchPresented() const;
+    void showVanishedItem(const platform::Url& url);
+    void openFolder(const platform::Url& url, const platform::Operation& op);
+    void openDocument(const std::shared_ptr<DRItem>& item);
+
+    bool _pickerIsAlive = false;
+    std::weak_ptr<platform::ui::ViewController> _splitViewController;
+    std::string _viewTitle;
+    std::optional<platform::Date> _lastQuotaFetch;
+    std::shared_ptr<QuotaFetcher> _quotaFetcher;
+    std::shared_ptr<PreviewItemManager> _itemManager;
+    std::shared_ptr<platform::components::UpgradeFlow> _upgradeFlowMgr;
+    std::shared_ptr<const platform::StorageOffer> _upgradeOffer;
+    std::uint64_t _quotaBytes = 0;
+    std::vector<platform::Observation> _observations;
+};
+
+} // namespace tarrow
