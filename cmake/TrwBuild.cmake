@@ -1,10 +1,10 @@
 # One target per folder, and headers that only the folders allowed to can see.
 #
-# trw_folder(<target> <folder> [LINKS <public targets>...] [PRIVATE_LINKS <targets>...])
+# trw_folder(<target> <folder> [LINKS <public targets>...] [PRIVATE_LINKS <targets>...] [ONLY <regex>] [EXCEPT <regex>])
 #   makes a static library of the folder's sources. Its headers become visible as "<folder>/<Name>.h" through
 #   a link tree of the target's own, so a source sees exactly the folders that its target links and an include
 #   that breaks the direction of the layers does not compile. With TRW_CHECK_HEADERS every header is also
-#   compiled alone.
+#   compiled alone. ONLY and EXCEPT choose files of the folder by their names.
 
 option(TRW_BUILD_TESTS "Build the tests" ON)
 option(TRW_BUILD_BENCH "Build the benchmarks" OFF)
@@ -31,10 +31,18 @@ if(TRW_PRIVATE_LOG)
 endif()
 
 function(trw_folder target folder)
-    cmake_parse_arguments(ARG "" "" "LINKS;PRIVATE_LINKS" ${ARGN})
+    cmake_parse_arguments(ARG "" "ONLY;EXCEPT" "LINKS;PRIVATE_LINKS" ${ARGN})
     file(GLOB sources CONFIGURE_DEPENDS ${CMAKE_SOURCE_DIR}/${folder}/*.cpp)
     file(GLOB headers CONFIGURE_DEPENDS ${CMAKE_SOURCE_DIR}/${folder}/*.h)
     list(FILTER sources EXCLUDE REGEX "/main[^/]*\\.cpp$")
+    foreach(files sources headers)
+        if(ARG_ONLY)
+            list(FILTER ${files} INCLUDE REGEX "/${ARG_ONLY}\\.(h|cpp)$")
+        endif()
+        if(ARG_EXCEPT)
+            list(FILTER ${files} EXCLUDE REGEX "/${ARG_EXCEPT}\\.(h|cpp)$")
+        endif()
+    endforeach()
     set(root ${CMAKE_BINARY_DIR}/include/${target})
     file(REMOVE_RECURSE ${root})
     file(MAKE_DIRECTORY ${root}/${folder})

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/system/CoordinatedRead.h"
 #include "platform/FileCoordinator.h"
 
 namespace host::system {
@@ -11,8 +12,12 @@ public:
     std::optional<platform::Error> coordinateReading(
         const platform::Url& url, platform::ReadingOptions options, const Accessor& accessor) override
     {
-        (void)options;
-        accessor(url);
+        if (options == platform::ReadingOptions::ImmediatelyAvailableMetadataOnly) {
+            const CoordinatedRead marked;
+            accessor(url);
+        } else {
+            accessor(url);
+        }
         return std::nullopt;
     }
 };

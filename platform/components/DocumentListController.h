@@ -1,7 +1,5 @@
 #pragma once
 
-#include "platform/Error.h"
-#include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
 #include "platform/components/DocumentListAction.h"
 #include "platform/components/DocumentListControllerDelegate.h"
@@ -106,7 +104,7 @@ private:
     void showStateOfFolder();
     void showLoadingAfterDelay();
     void reportRemovalIfShown();
-    void open(const Url& url, FolderEntryKind kind);
+    void open(const Url& url, bool isFolder);
     void perform(DocumentListAction action, const Url& url);
 
     std::optional<Url> _presentedURL;
@@ -119,8 +117,6 @@ private:
     std::map<std::string, std::shared_ptr<void>> _associatedObjects;
     DocumentListActionSet _availableActions = 0;
     bool _editing = false;
-    std::optional<ListingStage> _state; ///< of the latest update; nothing before the first
-    std::optional<Error> _failure;
     bool _wasRemoved = false, _reportedRemoval = false;
 };
 

@@ -1,0 +1,35 @@
+#include "host/drive/BeneathRoot.h"
+
+#include <fcntl.h>
+#include <linux/openat2.h>
+#include <sys/syscall.h>
+
+#include <cerrno>
+
+namespace host::drive {
+
+using host::system::FileDescriptor;
+
+FileDescriptor openBeneath(const std::string& root, const std::string& relativePath, int flags)
+{
+    const FileDescriptor folder(::open(root.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
+    if (!folder)
+        return {};
+    open_how how{};
+    how.flags = static_cast<std::uint64_t>(flags | O_NOFOLLOW | O_CLOEXEC);
+    how.resolve = RESOLVE_BENEATH | RESOLVE_NO_SYMLINKS | RESOLVE_NO_MAGICLINKS;
+    // The kernel answers EAGAIN when something was renamed while it looked; it asks to be asked again.
+    for (int tries = 0; tries < 16; ++tries) {
+        const auto file = ::syscall(SYS_openat2, folder.get(), relativePath.c_str(), &how, sizeof how);
+        if (file >= 0 || (errno != EAGAIN && errno != EINTR))
+            return FileDescriptor(static_cast<int>(file));
+    }
+    return {};
+}
+
+std::string descriptorPath(const FileDescriptor& descriptor)
+{
+    return "/proc/self/fd/" + std::to_string(descriptor.get());
+}
+
+} // namespace host::drive

@@ -1,0 +1,16 @@
+#pragma once
+
+#include "host/system/FileDescriptor.h"
+
+#include <string>
+
+namespace host::drive {
+
+/// Opens a path below a folder without following any link on the way or at the end; nothing can lead outside.
+/// `flags` are open(2)'s. On failure errno tells why: EXDEV for a way out, ELOOP for a link.
+host::system::FileDescriptor openBeneath(const std::string& root, const std::string& relativePath, int flags);
+
+/// The path by which the kernel lets one name an open descriptor.
+std::string descriptorPath(const host::system::FileDescriptor& descriptor);
+
+} // namespace host::drive

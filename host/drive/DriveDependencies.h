@@ -1,0 +1,24 @@
+#pragma once
+
+#include <memory>
+
+namespace platform {
+class Dispatch;
+class LinkOpener;
+class Localization;
+class NotificationCenter;
+class TypeRegistry;
+} // namespace platform
+
+namespace host::drive {
+
+/// The services that the drive's own services stand on.
+struct DriveDependencies {
+    std::shared_ptr<platform::Dispatch> dispatch;
+    std::shared_ptr<platform::NotificationCenter> notificationCenter;
+    std::shared_ptr<platform::TypeRegistry> typeRegistry;
+    std::shared_ptr<platform::Localization> localization; ///< null: no name is translated
+    std::shared_ptr<platform::LinkOpener> linkOpener; ///< null: no page can be opened
+};
+
+} // namespace host::drive

@@ -1,0 +1,50 @@
+#pragma once
+
+#include "host/drive/ItemFacts.h"
+#include "platform/DocumentContainers.h"
+#include "platform/Localization.h"
+#include "platform/TypeRegistry.h"
+
+#include <memory>
+
+namespace host::drive {
+
+/// Turns what was found of an item into the values of its attributes.
+class ItemAttributes {
+public:
+    /// Extension of alias files; their kind is called "Alias" in every language.
+    static constexpr std::string_view aliasExtension = "trwalias";
+    static constexpr std::string_view aliasType = "app.tarrow.Drive.alias";
+
+    /// `localization` may be null: then no name is translated.
+    ItemAttributes(std::shared_ptr<const platform::TypeRegistry> types,
+        std::shared_ptr<const platform::DocumentContainers> containers,
+        std::shared_ptr<const platform::Localization> localization, platform::Url defaultContainer);
+
+    /// The values of the keys for an item that is here or promised. A key that the item has no value for is
+    /// left out; so is the thumbnail map.
+    platform::AttributeMap values(
+        const platform::Url& url, const ItemFacts& facts, platform::AttributeKeys keys) const;
+
+    /// Whether a picture is here, judged by its name.
+    bool isPicture(const platform::Url& url, const ItemFacts& facts) const;
+
+private:
+    struct Kind {
+        std::string type;
+        bool isDirectory;
+        bool isPackage;
+    };
+    Kind kind(const platform::Url& url, const ItemFacts& facts) const;
+    std::string localizedName(const platform::Url& url, const ItemFacts& facts) const;
+    std::optional<std::string> description(const std::string& type) const;
+    void set(platform::AttributeMap& map, platform::AttributeKey key, const platform::Url& url,
+        const ItemFacts& facts, const Kind& kind) const;
+
+    std::shared_ptr<const platform::TypeRegistry> _types;
+    std::shared_ptr<const platform::DocumentContainers> _containers;
+    std::shared_ptr<const platform::Localization> _localization;
+    platform::Url _defaultContainer;
+};
+
+} // namespace host::drive

@@ -1,0 +1,31 @@
+#include "host/drive/LocalCloudDocumentService.h"
+
+namespace host::drive {
+
+std::shared_ptr<LocalCloudDocumentService> LocalCloudDocumentService::create(
+    const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings)
+{
+    return std::shared_ptr<LocalCloudDocumentService>(
+        new LocalCloudDocumentService(layout.prepare(), dependencies, settings));
+}
+
+LocalCloudDocumentService::LocalCloudDocumentService(
+    const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings)
+    : _layout(layout)
+    , _account(layout)
+    , _containers(std::make_shared<LocalContainers>(layout, settings.languages))
+    , _promisedItems(layout,
+          ItemAttributes(dependencies.typeRegistry, _containers, dependencies.localization,
+              layout.defaultContainerURL()),
+          ThumbnailCache::create(settings.thumbnailFolder, dependencies.dispatch))
+    , _items(layout, dependencies.dispatch)
+    , _storageOffers(LocalStorageOfferManager::create(layout, dependencies))
+    , _monitor(AccountMonitor::start(layout, dependencies))
+{
+    _monitor->onFileChanged([weak = std::weak_ptr(_storageOffers)] {
+        if (const auto offers = weak.lock())
+            offers->accountFileChanged();
+    });
+}
+
+} // namespace host::drive

@@ -1,0 +1,60 @@
+#pragma once
+
+#include "host/drive/AccountMonitor.h"
+#include "host/drive/DriveDependencies.h"
+#include "host/drive/LocalAccount.h"
+#include "host/drive/LocalCloudItems.h"
+#include "host/drive/LocalContainers.h"
+#include "host/drive/LocalPromisedItems.h"
+#include "host/drive/LocalStorageOfferManager.h"
+#include "host/drive/ThumbnailCache.h"
+#include "platform/CloudDocumentService.h"
+
+namespace host::drive {
+
+/// The cloud document service on a folder of this machine. Make and destroy it on the main thread.
+class LocalCloudDocumentService : public platform::CloudDocumentService,
+                                  public platform::SecurityScopedAccess {
+public:
+    struct Settings {
+        std::vector<std::string> languages = userLanguages(); ///< for the containers' names
+        std::string thumbnailFolder = ThumbnailCache::sharedFolder();
+    };
+
+    /// Makes the drive's home folder when it is missing, and begins to watch the account.
+    static std::shared_ptr<LocalCloudDocumentService> create(
+        const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings);
+    static std::shared_ptr<LocalCloudDocumentService> create(
+        const DriveLayout& layout, const DriveDependencies& dependencies)
+    {
+        return create(layout, dependencies, Settings());
+    }
+
+    const DriveLayout& layout() const { return _layout; }
+    /// The account's storage offer; it follows the same file.
+    const std::shared_ptr<LocalStorageOfferManager>& storageOffers() const { return _storageOffers; }
+
+    platform::CloudAccount& account() override { return _account; }
+    platform::PromisedItems& promisedItems() override { return _promisedItems; }
+    platform::DocumentContainers& containers() override { return *_containers; }
+    platform::CloudItems& items() override { return _items; }
+    platform::SecurityScopedAccess& securityScopedAccess() override { return *this; }
+
+    // Everything of the local store may be used by its user at any time: no leave is needed.
+    bool startAccessing(const platform::Url&) override { return false; }
+    void stopAccessing(const platform::Url&) override { }
+
+private:
+    LocalCloudDocumentService(
+        const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings);
+
+    DriveLayout _layout;
+    LocalAccount _account;
+    std::shared_ptr<LocalContainers> _containers;
+    LocalPromisedItems _promisedItems;
+    LocalCloudItems _items;
+    std::shared_ptr<LocalStorageOfferManager> _storageOffers;
+    std::shared_ptr<AccountMonitor> _monitor;
+};
+
+} // namespace host::drive

@@ -1,0 +1,127 @@
+#include "host/drive/LocalCloudItems.h"
+
+#include "host/drive/AccountRecord.h"
+#include "host/drive/BeneathRoot.h"
+#include "host/drive/Bookmark.h"
+#include "host/drive/ItemFacts.h"
+#include "host/drive/LinkRecords.h"
+#include "host/drive/RealPath.h"
+#include "host/drive/SmallFile.h"
+
+#include <fcntl.h>
+
+namespace host::drive {
+
+namespace {
+
+using platform::Error;
+using platform::Result;
+using platform::Url;
+
+bool isWithin(const Url& url, const std::string& folder)
+{
+    const auto real = url.isFileURL() ? realPathOfEntry(url.path()) : std::nullopt;
+    return real && Url::fileURL(*real).isWithin(Url::fileURL(folder));
+}
+
+// The identifier that the item at a path below the drive's home carries, here or promised; 0 for none. The
+// item is held open while it is asked, so that the answer is about one item and no other.
+std::uint32_t identifierAt(const DriveLayout& layout, const std::string& relativePath)
+{
+    if (const auto item = openBeneath(layout.home(), relativePath, O_PATH))
+        return documentIdentifierOf(item);
+    const auto path = PromiseRecord::pathFor(relativePath);
+    const auto file = openBeneath(layout.home(), path, O_RDONLY | O_NONBLOCK);
+    const auto text =
+        file ? readSmallFile(file, path, PromiseRecord::maximumFileSize) : Result<std::string>();
+    const auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
+    return promise ? promise->documentIdentifier : 0;
+}
+
+Error unusableBookmark(const std::string& reason)
+{
+    return cloudError(CloudErrorCode::UnusableBookmark, {}, reason);
+}
+
+// The document that a bookmark names by its place, unless another document has taken that place.
+std::optional<Url> documentAtPlace(const DriveLayout& layout, const Bookmark& bookmark)
+{
+    const auto path = layout.containerDocuments(bookmark.container) + '/' + bookmark.path;
+    const auto& facts = lookAtItem(path);
+    if (facts.presence == ItemFacts::Presence::Missing)
+        return std::nullopt;
+    const auto found = facts.presence == ItemFacts::Presence::Promised ? facts.promise.documentIdentifier
+                                                                       : facts.marks.documentIdentifier;
+    if (bookmark.documentIdentifier != 0 && found != 0 && found != bookmark.documentIdentifier)
+        return std::nullopt;
+    return Url::fileURL(path);
+}
+
+std::optional<Url> findDocument(
+    const DriveLayout& layout, const DocumentIndex& index, std::uint32_t identifier)
+{
+    const auto path = identifier == 0 ? std::nullopt : index.pathOf(identifier);
+    if (!path || !isPlainRelativePath(*path) || identifierAt(layout, *path) != identifier)
+        return std::nullopt;
+    return Url::fileURL(layout.home() + '/' + *path);
+}
+
+Result<Url> findBookmarked(const DriveLayout& layout, const DocumentIndex& index, const std::string& text)
+{
+    const auto bookmark = Bookmark::decode(text);
+    if (!bookmark)
+        return unusableBookmark("The bookmark is damaged.");
+    const auto account = AccountRecord::read(layout);
+    if (!account || account->identity != bookmark->account)
+        return unusableBookmark("The bookmark belongs to another account.");
+    // The identifier stays with the document when it is moved, so it counts before the place.
+    auto found = findDocument(layout, index, bookmark->documentIdentifier);
+    if (!found)
+        found = documentAtPlace(layout, *bookmark);
+    if (!found)
+        return unusableBookmark("The document is no longer in the drive.");
+    // One wording for what is not there and for what lies elsewhere: nothing is told of the world outside.
+    if (!isWithin(*found, layout.documents()))
+        return unusableBookmark("The document is no longer in the drive.");
+    return *found;
+}
+
+} // namespace
+
+LocalCloudItems::LocalCloudItems(DriveLayout layout, const std::shared_ptr<platform::Dispatch>& dispatch)
+    : _layout(std::move(layout))
+    , _index(std::make_shared<DocumentIndex>(_layout.index()))
+    , _queue(dispatch->makeSerialQueue("TarrowDriveAppID.bookmarks"))
+{
+}
+
+bool LocalCloudItems::isInDocumentsArea(const Url& url) const
+{
+    return isWithin(url, _layout.documents());
+}
+
+bool LocalCloudItems::isInTrash(const Url& url) const
+{
+    return isWithin(url, _layout.trash());
+}
+
+Url LocalCloudItems::realURL(const Url& url) const
+{
+    const auto real = url.isFileURL() ? realPath(url.path()) : std::nullopt;
+    return real && *real != url.path() ? Url::fileURL(*real) : url;
+}
+
+std::optional<Url> LocalCloudItems::documentWithIdentifier(std::uint32_t identifier) const
+{
+    return findDocument(_layout, *_index, identifier);
+}
+
+void LocalCloudItems::decodeBookmark(
+    const std::string& bookmark, std::function<void(Result<Url>)> completion) const
+{
+    _queue->async([layout = _layout, index = _index, bookmark, completion = std::move(completion)] {
+        completion(findBookmarked(layout, *index, bookmark));
+    });
+}
+
+} // namespace host::drive

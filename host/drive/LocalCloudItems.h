@@ -1,0 +1,30 @@
+#pragma once
+
+#include "host/drive/DocumentIndex.h"
+#include "host/drive/DriveLayout.h"
+#include "platform/CloudItems.h"
+#include "platform/Dispatch.h"
+
+namespace host::drive {
+
+struct Bookmark;
+
+/// Where items of the local store lie.
+class LocalCloudItems : public platform::CloudItems {
+public:
+    LocalCloudItems(DriveLayout layout, const std::shared_ptr<platform::Dispatch>& dispatch);
+
+    bool isInDocumentsArea(const platform::Url& url) const override;
+    bool isInTrash(const platform::Url& url) const override;
+    platform::Url realURL(const platform::Url& url) const override;
+    void decodeBookmark(const std::string& bookmark,
+        std::function<void(platform::Result<platform::Url>)> completion) const override;
+    std::optional<platform::Url> documentWithIdentifier(std::uint32_t identifier) const override;
+
+private:
+    DriveLayout _layout;
+    std::shared_ptr<DocumentIndex> _index;
+    std::shared_ptr<platform::Queue> _queue;
+};
+
+} // namespace host::drive

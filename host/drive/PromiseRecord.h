@@ -1,0 +1,46 @@
+#pragma once
+
+#include "platform/Attributes.h"
+#include "platform/Error.h"
+
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace host::drive {
+
+/// What a promise says of the item that it stands for. What it does not say, or says in a way that cannot be
+/// right, is unknown.
+struct PromiseRecord {
+    /// Largest promise that is read, in bytes.
+    static constexpr std::size_t maximumFileSize = 64 * 1024;
+    static constexpr std::string_view suffix = ".trwpromise";
+
+    enum class Kind : std::uint8_t { File, Directory, Package };
+
+    Kind kind = Kind::File;
+    std::optional<std::uint64_t> size; ///< bytes
+    std::optional<platform::Date> created;
+    std::optional<platform::Date> modified;
+    std::string type; ///< uniform type identifier; empty: judge by the name
+    bool shared = false;
+    std::optional<platform::SharedItemRole> role;
+    bool extensionHidden = false;
+    std::uint32_t documentIdentifier = 0; ///< 0: none
+    std::vector<std::string> tags;
+    std::string content; ///< name of the content below the account's cloud folder; empty: not there
+
+    bool operator==(const PromiseRecord&) const = default;
+
+    /// Reads a promise's text. Nothing when it is no single, whole JSON object.
+    static std::optional<PromiseRecord> parse(std::string_view text);
+    std::string toJson() const;
+
+    /// The path of the promise of an item: a hidden file beside it.
+    static std::string pathFor(std::string_view itemPath);
+    /// The path of the item that a promise at this path stands for; nothing when the name is no promise's.
+    static std::optional<std::string> itemPathFor(std::string_view promisePath);
+};
+
+} // namespace host::drive

@@ -1,0 +1,73 @@
+#include "host/drive/SmallFile.h"
+
+#include "host/system/SystemErrors.h"
+
+#include <fcntl.h>
+
+#include <array>
+#include <cerrno>
+
+namespace host::drive {
+
+namespace {
+
+using platform::Error;
+
+// One read; only an interruption by a signal is tried again.
+ssize_t readSome(const host::system::FileDescriptor& file, char* into, std::size_t size)
+{
+    ssize_t count = 0;
+    do
+        count = ::read(file.get(), into, size);
+    while (count < 0 && errno == EINTR);
+    return count;
+}
+
+} // namespace
+
+Error itemError(int errorNumber, const std::string& path)
+{
+    return host::system::systemError(errorNumber == ENOTDIR ? ENOENT : errorNumber, path);
+}
+
+Error cloudError(CloudErrorCode code, const std::string& path, const std::string& reason)
+{
+    return Error(platform::errorDomain::cloud, static_cast<int>(code),
+        {{std::string(platform::errorKey::filePath), path},
+            {std::string(platform::errorKey::localizedDescription), reason}});
+}
+
+Error damagedRecord(const std::string& path, const std::string& reason)
+{
+    return cloudError(CloudErrorCode::DamagedRecord, path, reason);
+}
+
+platform::Result<std::string> readSmallFile(const std::string& path, std::size_t limit)
+{
+    const host::system::FileDescriptor file(
+        ::open(path.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC));
+    if (!file)
+        return itemError(errno, path);
+    return readSmallFile(file, path, limit);
+}
+
+platform::Result<std::string> readSmallFile(
+    const host::system::FileDescriptor& file, const std::string& path, std::size_t limit)
+{
+    // Most records fit here, and a read that does not fill its buffer has reached the end: one read is
+    // enough.
+    std::array<char, 4096> buffer;
+    std::string text;
+    for (;;) {
+        const auto count = readSome(file, buffer.data(), buffer.size());
+        if (count < 0)
+            return itemError(errno, path);
+        text.append(buffer.data(), static_cast<std::size_t>(count));
+        if (text.size() > limit)
+            return damagedRecord(path, "it is larger than " + std::to_string(limit) + " bytes");
+        if (static_cast<std::size_t>(count) < buffer.size())
+            return text;
+    }
+}
+
+} // namespace host::drive

@@ -1,0 +1,29 @@
+#pragma once
+
+#include "host/system/FileDescriptor.h"
+#include "platform/Error.h"
+
+#include <cstddef>
+#include <string>
+
+namespace host::drive {
+
+/// Reads a small file whole. A link as its last name is refused, and so is a file larger than `limit` bytes;
+/// it never waits for another program (a pipe reads as empty). Errors: FileErrorCode::NoSuchItem when there
+/// is none, else the system's, or CloudErrorCode::DamagedRecord for a file that is too large.
+platform::Result<std::string> readSmallFile(const std::string& path, std::size_t limit);
+/// The same from a file that is open; `path` is named in errors.
+platform::Result<std::string> readSmallFile(
+    const host::system::FileDescriptor& file, const std::string& path, std::size_t limit);
+
+/// The error of a system call on an item of the drive: as host::system::systemError(), but an item below
+/// something that is no folder is missing, too.
+platform::Error itemError(int errorNumber, const std::string& path);
+
+/// A record of the drive that cannot be used: the cloud domain, with the reason in plain words.
+platform::Error damagedRecord(const std::string& path, const std::string& reason);
+/// Codes of errorDomain::cloud.
+enum class CloudErrorCode : int { DamagedRecord = 1, OutsideDrive, UnknownContainer, UnusableBookmark };
+platform::Error cloudError(CloudErrorCode code, const std::string& path, const std::string& reason);
+
+} // namespace host::drive

@@ -1,0 +1,184 @@
+#include "tests/support/DriveFixture.h"
+
+#include "host/drive/AccountRecord.h"
+#include "host/drive/ItemFacts.h"
+#include "host/drive/LinkRecords.h"
+#include "host/system/JsonKeyedArchiver.h"
+#include "host/system/JsonUserDefaults.h"
+#include "host/system/LocalFileCoordinator.h"
+#include "host/system/PosixFileSystem.h"
+#include "platform/TypeRegistry.h"
+
+#include <glib.h>
+#include <sys/xattr.h>
+
+#include <algorithm>
+#include <filesystem>
+#include <fstream>
+#include <stdexcept>
+
+namespace testing_support {
+
+namespace {
+
+using host::drive::DriveLayout;
+using platform::Url;
+
+void writeFile(const std::string& path, std::string_view content)
+{
+    std::filesystem::create_directories(std::filesystem::path(path).parent_path());
+    std::ofstream file(path, std::ios::binary | std::ios::trunc);
+    file.write(content.data(), static_cast<std::streamsize>(content.size()));
+    if (!file.flush())
+        throw std::runtime_error("cannot write " + path);
+}
+
+/// Types of the extensions that tests use.
+class ExtensionTypes : public platform::TypeRegistry {
+public:
+    std::optional<std::string> typeForExtension(std::string_view extension) const override
+    {
+        const auto* row = find(&Row::extension, extension);
+        return row ? std::optional(std::string(row->type)) : std::nullopt;
+    }
+    bool conformsTo(std::string_view type, std::string_view other) const override
+    {
+        const auto* row = find(&Row::type, type);
+        return type == other || (row && row->kindOf == other);
+    }
+    std::optional<std::string> description(std::string_view type) const override
+    {
+        const auto* row = find(&Row::type, type);
+        return row ? std::optional(std::string(row->description)) : std::nullopt;
+    }
+    std::string iconName(std::string_view) const override { return "text-x-generic"; }
+
+private:
+    struct Row {
+        std::string_view extension, type, kindOf, description;
+    };
+    static const Row* find(std::string_view Row::*column, std::string_view value)
+    {
+        static constexpr Row rows[] = {
+            {"txt", "public.plain-text", "public.text", "Plain text document"},
+            {"png", "public.png", "public.image", "PNG image"},
+            {"jpg", "public.jpeg", "public.image", "JPEG image"},
+            {"pdf", "public.pdf", "public.data", "PDF document"},
+            {"pages", "app.tarrow.pages", "public.package", "Pages document"},
+        };
+        const auto* row = std::ranges::find(rows, value, column);
+        return row == std::end(rows) ? nullptr : row;
+    }
+};
+
+} // namespace
+
+DriveFixture::DriveFixture()
+{
+    const auto layout = DriveLayout::at(_folder.at("drive"));
+    writeFile(layout.account(), host::drive::AccountRecord{"account-1", "Mira", {}}.toJson());
+    for (const auto& name : {"Desktop", "Documents"})
+        std::filesystem::create_directories(layout.defaultContainer() + '/' + name);
+    std::filesystem::create_directories(layout.trash());
+
+    platform::ServiceSet set;
+    set.dispatch = dispatch;
+    set.notificationCenter = notifications;
+    set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>();
+    set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
+    set.typeRegistry = std::make_shared<ExtensionTypes>();
+    set.keyedArchiver = std::make_shared<host::system::JsonKeyedArchiver>();
+    set.userDefaults = std::make_shared<host::system::JsonUserDefaults>(layout.defaults(), *dispatch);
+    host::drive::DriveDependencies dependencies{
+        dispatch, notifications, set.typeRegistry, set.localization, set.linkOpener};
+    cloud = host::drive::LocalCloudDocumentService::create(
+        layout, dependencies, {{"en"}, _folder.at("thumbnails")});
+    set.cloudDocumentService = cloud;
+    set.storageOfferManager = cloud->storageOffers();
+    platform::installServices(std::move(set));
+}
+
+DriveFixture::~DriveFixture()
+{
+    platform::installServices({});
+    platform::installLogSink(nullptr);
+}
+
+Url DriveFixture::url(std::string_view relativePath) const
+{
+    return Url::fileURL(layout().defaultContainer() + '/' + std::string(relativePath));
+}
+
+Url DriveFixture::writeDocument(std::string_view relativePath, std::string_view content) const
+{
+    const auto location = url(relativePath);
+    writeFile(location.path(), content);
+    return location;
+}
+
+Url DriveFixture::makeFolder(std::string_view relativePath) const
+{
+    const auto location = url(relativePath);
+    std::filesystem::create_directories(location.path());
+    return location;
+}
+
+Url DriveFixture::writePromise(std::string_view relativePath, const host::drive::PromiseRecord& promise) const
+{
+    const auto location = url(relativePath);
+    writeFile(host::drive::PromiseRecord::pathFor(location.path()), promise.toJson());
+    return location;
+}
+
+Url DriveFixture::writeLink(std::string_view relativePath, const std::string& target) const
+{
+    const auto location = url(relativePath);
+    std::filesystem::create_directories(std::filesystem::path(location.path()).parent_path());
+    std::filesystem::create_symlink(target, location.path());
+    return location;
+}
+
+Url DriveFixture::writeReference(
+    std::string_view relativePath, const std::string& container, const std::string& path) const
+{
+    return writeDocument(relativePath, host::drive::referenceJson(container, path));
+}
+
+Url DriveFixture::writeAlias(std::string_view relativePath, const std::string& target) const
+{
+    return writeDocument(relativePath, host::drive::aliasJson(target));
+}
+
+Url DriveFixture::makeContainer(
+    const std::string& identifier, const host::drive::ContainerRecord& description) const
+{
+    const auto documents = layout().containerDocuments(identifier);
+    std::filesystem::create_directories(documents);
+    writeFile(layout().containerDescription(identifier), description.toJson());
+    return Url::fileURL(documents, platform::PathKind::Directory);
+}
+
+void DriveFixture::mark(const Url& url, const char* attribute, std::string_view value) const
+{
+    if (::lsetxattr(url.path().c_str(), attribute, value.data(), value.size(), 0) != 0)
+        throw std::runtime_error("cannot set an attribute of " + url.path());
+}
+
+void DriveFixture::signIn(const std::string& name) const
+{
+    writeFile(
+        layout().account(), host::drive::AccountRecord{host::drive::localIdentity(name), name, {}}.toJson());
+}
+
+void DriveFixture::signOut() const
+{
+    std::filesystem::remove(layout().account());
+}
+
+void DriveFixture::settle() const
+{
+    while (g_main_context_iteration(nullptr, FALSE)) { }
+    dispatch->runUntilIdle();
+}
+
+} // namespace testing_support
