@@ -1,0 +1,31 @@
+#pragma once
+
+#include "platform/Formatters.h"
+
+#include <memory>
+#include <string>
+
+namespace host::system {
+
+/// Texts by the locale data of ICU. Byte counts use bytes, KB, MB, GB, TB and PB; an amount that rounds up to
+/// a full unit is shown in that unit, and none at all as "Zero KB" ("0" without its unit).
+class IcuFormatters : public platform::Formatters {
+public:
+    /// `locale` as ICU names it; `timeZone` as in "Europe/Vienna", empty for the system's.
+    explicit IcuFormatters(const std::string& locale, const std::string& timeZone = {});
+    ~IcuFormatters() override;
+
+    std::string byteCount(
+        std::uint64_t bytes, platform::ByteCountStyle style, platform::ByteCountUnit unit) const override;
+    double byteCountNumber(std::uint64_t bytes, platform::ByteCountStyle style) const override;
+    std::string number(std::int64_t value) const override;
+    std::string date(
+        platform::Date date, platform::DateStyle dateStyle, platform::DateStyle timeStyle) const override;
+    bool equalIgnoringCase(const std::string& a, const std::string& b) const override;
+
+private:
+    struct Data;
+    std::unique_ptr<Data> _data;
+};
+
+} // namespace host::system

@@ -1,0 +1,19 @@
+#pragma once
+
+#include <string>
+
+namespace host::system {
+
+/// The user's languages and region.
+struct UserLocale {
+    /// Languages for texts, most wanted first, separated by colons ("de_AT:de:en").
+    std::string languages;
+    /// The locale of dates, numbers and sorting, as ICU names it ("de_AT").
+    std::string formats;
+
+    /// Reads LANGUAGE, LC_ALL, LC_MESSAGES, LC_TIME, LC_COLLATE and LANG as the C library does. Where nothing
+    /// or only the "C" locale is asked for, the answer is English.
+    static UserLocale fromEnvironment();
+};
+
+} // namespace host::system
