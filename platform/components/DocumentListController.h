@@ -1,5 +1,7 @@
 #pragma once
 
+#include "platform/Error.h"
+#include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
 #include "platform/components/DocumentListAction.h"
 #include "platform/components/DocumentListControllerDelegate.h"
@@ -104,7 +106,7 @@ private:
     void showStateOfFolder();
     void showLoadingAfterDelay();
     void reportRemovalIfShown();
-    void open(const Url& url, bool isFolder);
+    void open(const Url& url, FolderEntryKind kind);
     void perform(DocumentListAction action, const Url& url);
 
     std::optional<Url> _presentedURL;
@@ -117,7 +119,12 @@ private:
     std::map<std::string, std::shared_ptr<void>> _associatedObjects;
     DocumentListActionSet _availableActions = 0;
     bool _editing = false;
+    std::optional<ListingStage> _state; ///< of the latest update; nothing before the first
+    std::optional<Error> _failure;
     bool _wasRemoved = false, _reportedRemoval = false;
 };
+
+/// How a list reads in a log line.
+std::string logText(const std::shared_ptr<DocumentListController>& list);
 
 } // namespace platform::components

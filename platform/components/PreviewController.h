@@ -7,6 +7,10 @@
 #include <memory>
 #include <optional>
 
+namespace platform {
+class OperationQueue;
+} // namespace platform
+
 namespace platform::components {
 
 class PlaceholderView;
@@ -62,6 +66,8 @@ public:
 
 private:
     void load();
+    void showNothing();
+    void showLoadingAfterDelay();
     void show(std::shared_ptr<const PreviewContent> content);
     void setContentView(const std::shared_ptr<ui::View>& contentView);
 
@@ -71,6 +77,7 @@ private:
     std::shared_ptr<const PreviewContent> _content;
     std::shared_ptr<ui::View> _contentView;
     ui::BarButtonItems _additionalItems;
+    std::shared_ptr<OperationQueue> _queue;
     unsigned _generation = 0; ///< of the latest load; an older one that ends is ignored
 };
 

@@ -1,0 +1,15 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+namespace platform::components {
+
+/// A file name as text for the screen: bytes that are no UTF-8 show as the replacement character, control
+/// characters as a blank.
+std::string displayName(std::string_view bytes);
+
+/// The extension of a name without its dot; empty for none.
+std::string_view nameExtension(std::string_view name);
+
+} // namespace platform::components

@@ -1,0 +1,168 @@
+#include "platform/components/DocumentListController.h"
+
+#include "platform/Localization.h"
+#include "platform/components/DocumentRowSource.h"
+#include "platform/components/FolderContents.h"
+#include "platform/ui/ListView.h"
+
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+struct ActionEntry {
+    DocumentListAction action;
+    const char* title;
+    ui::MenuActionStyle style;
+    bool forLibraries; ///< whether an app library offers it
+};
+
+constexpr ActionEntry menuEntries[] = {
+    {DocumentListAction::Info, "Info", ui::MenuActionStyle::Default, true},
+    {DocumentListAction::Share, "Share", ui::MenuActionStyle::Default, true},
+    {DocumentListAction::Rename, "Rename", ui::MenuActionStyle::Default, false},
+    {DocumentListAction::Move, "Move", ui::MenuActionStyle::Default, false},
+    {DocumentListAction::More, "More", ui::MenuActionStyle::Default, true},
+    {DocumentListAction::Delete, "Delete", ui::MenuActionStyle::Destructive, true},
+};
+
+bool opensAsFolder(FolderEntryKind kind)
+{
+    return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
+}
+
+} // namespace
+
+std::size_t DocumentListController::containedItemCount() const
+{
+    return _contents ? _contents->rows()->count() : 0;
+}
+
+std::vector<Url> DocumentListController::containedItems() const
+{
+    std::vector<Url> items;
+    items.reserve(containedItemCount());
+    for (std::size_t row = 0; row < containedItemCount(); ++row)
+        items.push_back(_contents->rows()->url(row));
+    return items;
+}
+
+std::size_t DocumentListController::selectedItemCount() const
+{
+    return _listView ? _listView->selection().count() : 0;
+}
+
+std::vector<Url> DocumentListController::selectedItems() const
+{
+    std::vector<Url> items;
+    if (selectedItemCount() == 0)
+        return items;
+    const auto& rows = *_contents->rows();
+    for (std::size_t row = 0; row < rows.count(); ++row) {
+        if (_listView->selection().contains(rows.ids()[row]))
+            items.push_back(rows.url(row));
+    }
+    return items;
+}
+
+void DocumentListController::setSelectedItems(const std::vector<Url>& items)
+{
+    if (!_editing || !_contents || !isViewLoaded())
+        return;
+    ui::SelectionModel selection;
+    for (const auto& item : items)
+        selection.select(_contents->rows()->idFor(item));
+    selection.keepOnly(_contents->rows()->ids());
+    _listView->setSelection(std::move(selection));
+    selectionDidChange(*_listView);
+}
+
+void DocumentListController::setEditingAnimated(bool editing, bool)
+{
+    _editing = editing;
+    if (isViewLoaded())
+        _listView->setSelectionMode(editing ? ui::SelectionMode::Multiple : ui::SelectionMode::None);
+}
+
+void DocumentListController::selectionDidChange(ui::ListView&)
+{
+    if (const auto told = delegate())
+        told->documentListControllerItemsChanged(self());
+}
+
+void DocumentListController::visibleRowsDidChange(ui::ListView&, ui::RowRange)
+{
+    _rows->visibleRowsDidChange();
+}
+
+void DocumentListController::refreshRequested(ui::ListView&)
+{
+    refresh();
+}
+
+void DocumentListController::rowActivated(ui::ListView&, std::size_t index)
+{
+    const auto rows = _rows->rows();
+    if (rows && index < rows->count())
+        open(rows->url(index), rows->entry(index).kind);
+}
+
+void DocumentListController::open(const Url& url, FolderEntryKind kind)
+{
+    const auto told = delegate();
+    if (!told)
+        return;
+    if (opensAsFolder(kind))
+        told->documentListControllerDidSelectContainerWithViewController(self(), initWithURL(url));
+    else
+        told->documentListControllerDidSelectItemAtURL(self(), url);
+}
+
+ui::Menu DocumentListController::menuForRow(ui::ListView&, std::size_t index)
+{
+    ui::Menu menu;
+    const auto rows = _rows->rows();
+    if (_editing || !rows || index >= rows->count())
+        return menu;
+    const bool isLibrary = rows->entry(index).kind == FolderEntryKind::Library;
+    for (const auto& entry : menuEntries) {
+        if (!(_availableActions & actionBit(entry.action)) || (isLibrary && !entry.forLibraries))
+            continue;
+        auto chosen = [weak = std::weak_ptr(self()), action = entry.action, url = rows->url(index)] {
+            if (const auto list = weak.lock())
+                list->perform(action, url);
+        };
+        menu.push_back({.title = localized(entry.title),
+            .handler = std::move(chosen),
+            .style = entry.style,
+            .image = {}});
+    }
+    return menu;
+}
+
+void DocumentListController::perform(DocumentListAction action, const Url& url)
+{
+    if (const auto told = delegate())
+        told->documentListControllerPerformActionURLOriginatingViewCompletion(
+            self(), static_cast<int>(action), url, _listView, {});
+}
+
+std::shared_ptr<ui::ViewController> DocumentListController::peekForRow(ui::ListView&, std::size_t index)
+{
+    const auto told = delegate();
+    const auto rows = _rows->rows();
+    if (!told || _editing || !rows || index >= rows->count())
+        return nullptr;
+    return told->documentListControllerViewControllerForPreviewingItemAtURL(self(), rows->url(index));
+}
+
+void DocumentListController::peekWasOpened(ui::ListView&, std::size_t index)
+{
+    const auto rows = _rows->rows();
+    const bool isOffered = _availableActions & actionBit(DocumentListAction::PressurePop);
+    if (isOffered && rows && index < rows->count())
+        perform(DocumentListAction::PressurePop, rows->url(index));
+}
+
+} // namespace platform::components

@@ -1,0 +1,13 @@
+#include "platform/components/DocumentListControllerDelegate.h"
+
+#include "platform/ui/StandardColors.h"
+
+namespace platform::components {
+
+std::vector<Color> DocumentListControllerDelegate::documentListControllerColorsForTagNames(
+    const List&, const std::vector<std::string>& names)
+{
+    return std::vector<Color>(names.size(), ui::StandardColors::gray);
+}
+
+} // namespace platform::components

@@ -1,0 +1,166 @@
+#include "platform/components/DocumentRowSource.h"
+
+#include "platform/Localization.h"
+#include "platform/Services.h"
+#include "platform/TypeRegistry.h"
+#include "platform/components/DisplayName.h"
+#include "platform/ui/ListView.h"
+
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+constexpr const char* folderIcon = "folder";
+constexpr const char* plainDocumentIcon = "text-x-generic";
+
+bool opensAsFolder(FolderEntryKind kind)
+{
+    return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
+}
+
+std::string spokenDescription(const ui::ListRow& row, const std::vector<std::string>& tagNames)
+{
+    std::string spoken = row.title;
+    const auto add = [&spoken](const std::string& part) {
+        if (!part.empty())
+            spoken += ", " + part;
+    };
+    add(row.detail);
+    if (row.download == ui::DownloadState::InCloud)
+        add(localized("In the cloud"));
+    for (const auto& name : tagNames)
+        add(name);
+    return spoken;
+}
+
+} // namespace
+
+std::shared_ptr<DocumentRowSource> DocumentRowSource::create(const std::shared_ptr<ui::ListView>& list)
+{
+    const auto source = std::make_shared<DocumentRowSource>(list);
+    source->_loader =
+        RowDetailsLoader::create([weak = std::weak_ptr(source)](ui::RowId id, RowDetails details) {
+            if (const auto self = weak.lock())
+                self->detailsArrived(id, std::move(details));
+        });
+    return source;
+}
+
+DocumentRowSource::DocumentRowSource(const std::shared_ptr<ui::ListView>& list)
+    : _list(list)
+{
+}
+
+std::size_t DocumentRowSource::numberOfRows(const ui::ListView&) const
+{
+    return _rows ? _rows->count() : 0;
+}
+
+ui::RowId DocumentRowSource::rowIdAtIndex(const ui::ListView&, std::size_t index) const
+{
+    return _rows->ids()[index];
+}
+
+ui::ListRow DocumentRowSource::rowAtIndex(const ui::ListView&, std::size_t index) const
+{
+    const auto entry = _rows->entry(index);
+    ui::ListRow row;
+    row.id = _rows->ids()[index];
+    row.image = iconFor(index, entry);
+    row.title = displayName(entry.name);
+    row.accessory = opensAsFolder(entry.kind) ? ui::RowAccessory::Disclosure : ui::RowAccessory::None;
+    row.download = entry.isPromise ? ui::DownloadState::InCloud : ui::DownloadState::Present;
+    const auto known = _known.find(row.id);
+    const bool isKnown = known != _known.end();
+    if (isKnown)
+        complete(row, known->second.details);
+    row.accessibleDescription =
+        spokenDescription(row, isKnown ? known->second.details.tagNames : std::vector<std::string>());
+    return row;
+}
+
+void DocumentRowSource::complete(ui::ListRow& row, const RowDetails& details) const
+{
+    if (details.name && !details.name->empty())
+        row.title = displayName(*details.name);
+    row.detail = details.text;
+    if (row.download == ui::DownloadState::Present)
+        row.download = details.download;
+    if (_tagColors && !details.tagNames.empty())
+        row.tagColors = _tagColors(details.tagNames);
+}
+
+Image DocumentRowSource::iconFor(std::size_t index, const FolderEntry& entry) const
+{
+    if (const auto* extra = _rows->extraItem(index); extra && !extra->iconName.empty())
+        return Image::named(extra->iconName);
+    return Image::named(opensAsFolder(entry.kind) ? folderIcon : documentIcon(entry.name));
+}
+
+const std::string& DocumentRowSource::documentIcon(std::string_view name) const
+{
+    const std::string extension(nameExtension(name));
+    const auto known = _iconsByExtension.find(extension);
+    if (known != _iconsByExtension.end())
+        return known->second;
+    const auto& types = services().typeRegistry();
+    const auto type = types.typeForExtension(extension);
+    return _iconsByExtension.emplace(extension, type ? types.iconName(*type) : plainDocumentIcon)
+        .first->second;
+}
+
+void DocumentRowSource::visibleRowsDidChange()
+{
+    const auto list = _list.lock();
+    if (!list || !_rows)
+        return;
+    std::vector<RowDetailsLoader::Request> requests;
+    const auto range = list->visibleRows();
+    for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {
+        const auto id = _rows->ids()[row];
+        const auto known = _known.find(id);
+        if (known == _known.end() || known->second.isStale)
+            requests.push_back({id, _rows->url(row), _rows->entry(row).kind});
+    }
+    _loader->setWanted(requests);
+    forgetDetailsOutside(range);
+}
+
+void DocumentRowSource::refreshDetails()
+{
+    for (auto& [id, known] : _known)
+        known.isStale = true;
+    _loader->cancelAll();
+    visibleRowsDidChange();
+}
+
+void DocumentRowSource::detailsArrived(ui::RowId id, RowDetails details)
+{
+    const auto known = _known.find(id);
+    const bool isNews = known == _known.end() || !(known->second.details == details);
+    _known.insert_or_assign(id, Known{std::move(details)});
+    const auto list = _list.lock();
+    if (!isNews || !list)
+        return;
+    const auto range = list->visibleRows();
+    for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {
+        if (_rows->ids()[row] == id)
+            list->rowChanged(row);
+    }
+}
+
+void DocumentRowSource::forgetDetailsOutside(const ui::RowRange& range)
+{
+    if (_known.size() <= keptDetails)
+        return;
+    std::unordered_map<ui::RowId, Known> kept;
+    for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {
+        if (auto known = _known.extract(_rows->ids()[row]))
+            kept.insert(std::move(known));
+    }
+    _known = std::move(kept);
+}
+
+} // namespace platform::components

@@ -1,0 +1,68 @@
+#pragma once
+
+#include "platform/Color.h"
+#include "platform/components/DocumentRows.h"
+#include "platform/components/RowDetailsLoader.h"
+#include "platform/ui/ListViewDataSource.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <unordered_map>
+#include <vector>
+
+namespace platform::ui {
+class ListView;
+} // namespace platform::ui
+
+namespace platform::components {
+
+/// Makes the rows of a document list from what the listing knows, and completes them with details that are
+/// fetched while they are visible. Main thread only.
+class DocumentRowSource : public ui::ListViewDataSource,
+                          public std::enable_shared_from_this<DocumentRowSource> {
+public:
+    /// The dots for tags; called on the main thread for rows that are about to be seen.
+    using TagColors = std::function<std::vector<Color>(const std::vector<std::string>& names)>;
+
+    /// Details of this many rows are kept; beyond, those that are not visible go.
+    static constexpr std::size_t keptDetails = 2000;
+
+    static std::shared_ptr<DocumentRowSource> create(const std::shared_ptr<ui::ListView>& list);
+    explicit DocumentRowSource(const std::shared_ptr<ui::ListView>& list);
+
+    const std::shared_ptr<const DocumentRows>& rows() const { return _rows; }
+    /// The list has to be told the difference by the caller.
+    void setRows(std::shared_ptr<const DocumentRows> rows) { _rows = std::move(rows); }
+    void setTagColors(TagColors tagColors) { _tagColors = std::move(tagColors); }
+
+    /// Fetches what is missing for the visible rows.
+    void visibleRowsDidChange();
+    /// The items may have changed: known details stay on the screen until they have been read again.
+    void refreshDetails();
+
+    std::size_t numberOfRows(const ui::ListView& list) const override;
+    ui::ListRow rowAtIndex(const ui::ListView& list, std::size_t index) const override;
+    ui::RowId rowIdAtIndex(const ui::ListView& list, std::size_t index) const override;
+
+private:
+    struct Known {
+        RowDetails details;
+        bool isStale = false;
+    };
+
+    void detailsArrived(ui::RowId id, RowDetails details);
+    void forgetDetailsOutside(const ui::RowRange& range);
+    void complete(ui::ListRow& row, const RowDetails& details) const;
+    Image iconFor(std::size_t index, const FolderEntry& entry) const;
+    const std::string& documentIcon(std::string_view name) const;
+
+    std::weak_ptr<ui::ListView> _list;
+    std::shared_ptr<const DocumentRows> _rows;
+    std::shared_ptr<RowDetailsLoader> _loader;
+    TagColors _tagColors;
+    std::unordered_map<ui::RowId, Known> _known;
+    mutable std::unordered_map<std::string, std::string> _iconsByExtension;
+};
+
+} // namespace platform::components

@@ -1,0 +1,114 @@
+#include "platform/components/DocumentRows.h"
+
+#include <algorithm>
+#include <functional>
+#include <string>
+#include <unordered_map>
+
+namespace platform::components {
+
+namespace {
+
+ui::RowId idOfName(std::string_view name)
+{
+    return std::hash<std::string_view>{}(name);
+}
+
+ui::RowId idOfExtraItem(const Url& url)
+{
+    // A library may have the name of a folder beside it.
+    return ~std::hash<std::string>{}(url.path());
+}
+
+char folded(char c)
+{
+    return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
+}
+
+bool holds(std::string_view name, std::string_view foldedText)
+{
+    const auto same = [](char a, char b) { return folded(a) == b; };
+    return std::search(name.begin(), name.end(), foldedText.begin(), foldedText.end(), same) != name.end();
+}
+
+/// What a row shows of its entry beside the name, in one number.
+unsigned appearance(const FolderEntry& entry)
+{
+    return static_cast<unsigned>(entry.kind) * 2 + (entry.isPromise ? 1 : 0);
+}
+
+std::unordered_map<ui::RowId, unsigned> appearances(const DocumentRows& rows)
+{
+    std::unordered_map<ui::RowId, unsigned> found;
+    found.reserve(rows.count());
+    for (std::size_t row = 0; row < rows.count(); ++row)
+        found.emplace(rows.ids()[row], appearance(rows.entry(row)));
+    return found;
+}
+
+std::vector<ui::RowRange> rowsOfOtherAppearance(const DocumentRows& before, const DocumentRows& after)
+{
+    std::vector<ui::RowRange> changed;
+    const auto known = appearances(before);
+    for (std::size_t row = 0; row < after.count(); ++row) {
+        const auto found = known.find(after.ids()[row]);
+        if (found == known.end() || found->second == appearance(after.entry(row)))
+            continue;
+        if (!changed.empty() && changed.back().end() == row)
+            ++changed.back().count;
+        else
+            changed.push_back({row, 1});
+    }
+    return changed;
+}
+
+} // namespace
+
+std::shared_ptr<const DocumentRows> DocumentRows::make(std::shared_ptr<const FolderSnapshot> snapshot)
+{
+    const std::shared_ptr<DocumentRows> rows(new DocumentRows(std::move(snapshot)));
+    rows->_ids.reserve(rows->_snapshot->count());
+    for (std::size_t i = 0; i < rows->_snapshot->count(); ++i)
+        rows->append(i);
+    return rows;
+}
+
+std::shared_ptr<const DocumentRows> DocumentRows::matching(
+    std::shared_ptr<const FolderSnapshot> snapshot, std::string_view text)
+{
+    std::string sought(text);
+    std::transform(sought.begin(), sought.end(), sought.begin(), folded);
+    const std::shared_ptr<DocumentRows> rows(new DocumentRows(std::move(snapshot)));
+    for (std::size_t i = 0; i < rows->_snapshot->count(); ++i) {
+        if (!holds(rows->_snapshot->entry(i).name, sought))
+            continue;
+        rows->append(i);
+        rows->_indexes.push_back(static_cast<std::uint32_t>(i));
+    }
+    return rows;
+}
+
+void DocumentRows::append(std::size_t snapshotIndex)
+{
+    const auto* extra = _snapshot->extraItem(snapshotIndex);
+    auto id = extra ? idOfExtraItem(extra->url) : idOfName(_snapshot->entry(snapshotIndex).name);
+    // For a moment a document may stand beside its own promise: same name, neighbours in the order.
+    if (!_ids.empty() && _ids.back() == id)
+        ++id;
+    _ids.push_back(id);
+}
+
+ui::RowId DocumentRows::idFor(const Url& url) const
+{
+    const bool isInFolder = url.deletingLastPathComponent() == _snapshot->folder();
+    return isInFolder ? idOfName(url.lastPathComponent()) : idOfExtraItem(url);
+}
+
+ui::ListChanges DocumentRows::changes(const DocumentRows& before, const DocumentRows& after)
+{
+    auto changes = ui::ListChanges::between(before.ids(), after.ids());
+    changes.changed = rowsOfOtherAppearance(before, after);
+    return changes;
+}
+
+} // namespace platform::components

@@ -1,0 +1,56 @@
+#pragma once
+
+#include "platform/FolderSnapshot.h"
+#include "platform/Url.h"
+#include "platform/ui/ListChanges.h"
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <span>
+#include <string_view>
+#include <vector>
+
+namespace platform::components {
+
+/// The rows that a folder list shows: the items of one snapshot with the identifiers of their rows, or those
+/// of them whose name holds a text. Immutable; any thread. To make one takes a pass over all names.
+class DocumentRows {
+public:
+    static std::shared_ptr<const DocumentRows> make(std::shared_ptr<const FolderSnapshot> snapshot);
+    /// The rows of a snapshot whose names hold a text; capital and small ASCII letters are the same.
+    static std::shared_ptr<const DocumentRows> matching(
+        std::shared_ptr<const FolderSnapshot> snapshot, std::string_view text);
+
+    std::size_t count() const { return _ids.size(); }
+    std::span<const ui::RowId> ids() const { return _ids; }
+    FolderEntry entry(std::size_t row) const { return _snapshot->entry(snapshotIndex(row)); }
+    Url url(std::size_t row) const { return _snapshot->url(snapshotIndex(row)); }
+    /// Null for an item of the folder itself.
+    const FolderSnapshot::ExtraItem* extraItem(std::size_t row) const
+    {
+        return _snapshot->extraItem(snapshotIndex(row));
+    }
+    const std::shared_ptr<const FolderSnapshot>& snapshot() const { return _snapshot; }
+
+    /// The identifier that the row of an item has, whether it is there or not.
+    ui::RowId idFor(const Url& url) const;
+
+    /// The exact way from one state of a list to another; rows whose kind or promise changed count as
+    /// changed.
+    static ui::ListChanges changes(const DocumentRows& before, const DocumentRows& after);
+
+private:
+    explicit DocumentRows(std::shared_ptr<const FolderSnapshot> snapshot)
+        : _snapshot(std::move(snapshot))
+    {
+    }
+    std::size_t snapshotIndex(std::size_t row) const { return _indexes.empty() ? row : _indexes[row]; }
+    void append(std::size_t snapshotIndex);
+
+    std::shared_ptr<const FolderSnapshot> _snapshot;
+    std::vector<ui::RowId> _ids;
+    std::vector<std::uint32_t> _indexes; ///< of the rows in the snapshot; empty: all of them
+};
+
+} // namespace platform::components

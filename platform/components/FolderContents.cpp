@@ -1,0 +1,88 @@
+#include "platform/components/FolderContents.h"
+
+#include "platform/Services.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+FolderContentsUpdate updateBetween(const DocumentRows& before, std::shared_ptr<const FolderSnapshot> snapshot)
+{
+    const auto stage = snapshot->stage();
+    const auto error = snapshot->error();
+    const auto after = DocumentRows::make(std::move(snapshot));
+    return {after, DocumentRows::changes(before, *after), stage, error};
+}
+
+} // namespace
+
+std::shared_ptr<FolderContents> FolderContents::create(Url folder, Update update)
+{
+    return std::make_shared<FolderContents>(std::move(folder), std::move(update));
+}
+
+FolderContents::FolderContents(Url folder, Update update)
+    : _folder(std::move(folder))
+    , _update(std::move(update))
+    , _rows(DocumentRows::make(FolderSnapshot::Builder(_folder).finish(ListingStage::Complete)))
+    , _queue(services().dispatch().makeOperationQueue("folder contents", QualityOfService::UserInitiated))
+{
+}
+
+void FolderContents::start(std::vector<FolderSnapshot::ExtraItem> extraItems)
+{
+    _listing = services().folderLister().list(
+        _folder, std::move(extraItems), [weak = weak_from_this()](Snapshot snapshot) {
+            if (const auto self = weak.lock())
+                self->snapshotArrived(std::move(snapshot));
+        });
+}
+
+void FolderContents::snapshotArrived(Snapshot snapshot)
+{
+    // After the first rows of a listing anew, the complete list that is shown already says more.
+    if (snapshot->stage() == ListingStage::FirstRows && _rows->count() >= snapshot->count())
+        return;
+    if (_isWorking)
+        _waiting = std::move(snapshot);
+    else
+        workOut(std::move(snapshot));
+}
+
+void FolderContents::workOut(Snapshot snapshot)
+{
+    if (std::max(snapshot->count(), _rows->count()) <= immediateRows)
+        adopt(updateBetween(*_rows, std::move(snapshot)));
+    else
+        workOutInBackground(std::move(snapshot));
+}
+
+void FolderContents::workOutInBackground(Snapshot snapshot)
+{
+    _isWorking = true;
+    const auto main = services().dispatch().mainQueue();
+    _queue->addOperation([weak = weak_from_this(), before = _rows, snapshot, main] {
+        const auto update = std::make_shared<const FolderContentsUpdate>(updateBetween(*before, snapshot));
+        main->async([weak, update] {
+            const auto self = weak.lock();
+            if (!self)
+                return;
+            self->_isWorking = false;
+            self->adopt(*update);
+            if (const auto next = std::exchange(self->_waiting, nullptr))
+                self->workOut(next);
+        });
+    });
+}
+
+void FolderContents::adopt(const FolderContentsUpdate& update)
+{
+    _rows = update.rows;
+    if (_update)
+        _update(update);
+}
+
+} // namespace platform::components

@@ -1,0 +1,83 @@
+#include "platform/components/PlaceholderView.h"
+
+#include "platform/ui/ActivityIndicator.h"
+#include "platform/ui/ImageView.h"
+#include "platform/ui/Label.h"
+#include "platform/ui/StackView.h"
+#include "platform/ui/StandardColors.h"
+
+namespace platform::components {
+
+namespace {
+
+constexpr double margin = 24;
+constexpr double lineSpacing = 12;
+
+std::shared_ptr<ui::Label> makeLabel(const ui::Font& font)
+{
+    const auto label = std::make_shared<ui::Label>();
+    label->setFont(font);
+    label->setMaxLines(0);
+    label->setLineBreak(ui::LineBreak::WordWrap);
+    label->setAlignment(ui::TextAlignment::Center);
+    return label;
+}
+
+void show(ui::Label& label, const std::string& text)
+{
+    label.setText(text);
+    label.setHidden(text.empty());
+}
+
+} // namespace
+
+std::shared_ptr<PlaceholderView> PlaceholderView::create()
+{
+    const auto view = std::make_shared<PlaceholderView>();
+    view->build();
+    return view;
+}
+
+void PlaceholderView::build()
+{
+    _spinner = std::make_shared<ui::ActivityIndicator>();
+    _icon = std::make_shared<ui::ImageView>();
+    _icon->setContentMode(ui::ContentMode::AspectFit);
+    _icon->setAccessibility({.label = {}, .hint = {}, .isHidden = true});
+    _title = makeLabel(ui::Font::preferred(ui::TextStyle::Title2).bold());
+    _message = makeLabel(ui::Font::preferred(ui::TextStyle::Body));
+    _message->setTextColor(ui::StandardColors::gray);
+    _stack = std::make_shared<ui::StackView>(
+        std::vector<std::shared_ptr<ui::View>>{_spinner, _icon, _title, _message}, ui::Axis::Vertical);
+    _stack->setStackAlignment(ui::StackAlignment::Center);
+    _stack->setSpacing(lineSpacing);
+    _stack->setPlacedByFrame(false);
+    addSubview(_stack);
+    ui::LayoutConstraint::activate({
+        _stack->centerXAnchor().equalTo(centerXAnchor()),
+        _stack->centerYAnchor().equalTo(centerYAnchor()),
+        _stack->widthAnchor().lessThanOrEqualTo(widthAnchor(), -2 * margin),
+        _stack->widthAnchor().lessThanOrEqualToConstant(maximumWidth),
+        _icon->widthAnchor().equalToConstant(iconSide),
+        _icon->heightAnchor().equalToConstant(iconSide),
+    });
+    setContent({});
+}
+
+void PlaceholderView::setContent(const Content& content)
+{
+    _content = content;
+    _spinner->setHidden(!content.isBusy);
+    if (content.isBusy)
+        _spinner->startAnimating();
+    else
+        _spinner->stopAnimating();
+    const bool hasIcon = !content.isBusy && !content.iconName.empty();
+    _icon->setHidden(!hasIcon);
+    _icon->setImage(hasIcon ? std::optional(Image::named(content.iconName)) : std::nullopt);
+    show(*_title, content.title);
+    show(*_message, content.message);
+    setNeedsLayout();
+}
+
+} // namespace platform::components

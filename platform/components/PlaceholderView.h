@@ -1,0 +1,49 @@
+#pragma once
+
+#include "platform/ui/View.h"
+
+#include <memory>
+#include <string>
+
+namespace platform::ui {
+class ActivityIndicator;
+class ImageView;
+class Label;
+class StackView;
+} // namespace platform::ui
+
+namespace platform::components {
+
+/// What a screen shows in place of content: an icon, what is the matter, and what to do about it, centred and
+/// never wider than it can be read. Main thread only.
+class PlaceholderView : public ui::View {
+public:
+    struct Content {
+        std::string iconName{}; ///< of the icon theme; empty: none
+        std::string title{}; ///< empty: none
+        std::string message{}; ///< empty: none
+        bool isBusy = false; ///< with a spinner in place of the icon
+        bool operator==(const Content&) const = default;
+    };
+
+    static std::shared_ptr<PlaceholderView> create();
+
+    static constexpr double maximumWidth = 420; ///< points, of the text
+    static constexpr double iconSide = 96; ///< points
+
+    using ui::View::View;
+
+    const Content& content() const { return _content; }
+    void setContent(const Content& content);
+
+private:
+    void build();
+
+    Content _content;
+    std::shared_ptr<ui::StackView> _stack;
+    std::shared_ptr<ui::ActivityIndicator> _spinner;
+    std::shared_ptr<ui::ImageView> _icon;
+    std::shared_ptr<ui::Label> _title, _message;
+};
+
+} // namespace platform::components

@@ -1,0 +1,92 @@
+#include "platform/components/RowDetails.h"
+
+#include "platform/CloudDocumentService.h"
+#include "platform/FileCoordinator.h"
+#include "platform/Formatters.h"
+#include "platform/Localization.h"
+#include "platform/Services.h"
+
+#include <filesystem>
+#include <system_error>
+
+namespace platform::components {
+
+namespace {
+
+constexpr AttributeKey detailKeys[] = {AttributeKey::LocalizedName, AttributeKey::ContentModificationDate,
+    AttributeKey::FileSize, AttributeKey::IsShared, AttributeKey::DownloadingStatus};
+
+PromisedItems& promisedItems()
+{
+    return services().cloudDocumentService().promisedItems();
+}
+
+/// Whether a name of a folder stands for an item that its list shows.
+bool isListed(const std::filesystem::path& path)
+{
+    const auto& name = path.filename().native();
+    return !name.starts_with('.') || promisedItems().isItemPromise(Url::fileURL(path.native()));
+}
+
+std::optional<std::int64_t> numberOfItems(const Url& folder)
+{
+    std::error_code error;
+    std::filesystem::directory_iterator entry(folder.path(), error);
+    std::int64_t count = 0;
+    for (; !error && entry != std::filesystem::directory_iterator(); entry.increment(error))
+        count += isListed(entry->path()) ? 1 : 0;
+    return error ? std::nullopt : std::optional(count);
+}
+
+std::string sizeText(const Url& url, FolderEntryKind kind, const AttributeMap& values)
+{
+    if (kind == FolderEntryKind::Link)
+        return localized("Link");
+    if (kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library) {
+        const auto count = numberOfItems(url);
+        return count ? localizedPlural(".DICT.ITEMS.%d", {*count}) : std::string();
+    }
+    const auto* size = values.get<std::uint64_t>(AttributeKey::FileSize);
+    return size ? services().formatters().byteCount(*size, ByteCountStyle::File, ByteCountUnit::Included)
+                : std::string();
+}
+
+void appendPart(std::string& text, const std::string& part)
+{
+    if (!text.empty() && !part.empty())
+        text += " · ";
+    text += part;
+}
+
+AttributeMap attributes(const Url& url)
+{
+    AttributeMap values;
+    services().fileCoordinator().coordinateReading(
+        url, ReadingOptions::ImmediatelyAvailableMetadataOnly, [&values](const Url& location) {
+            if (auto read = promisedItems().promisedItemResourceValues(location, detailKeys))
+                values = std::move(*read.value);
+        });
+    return values;
+}
+
+} // namespace
+
+RowDetails readRowDetails(const Url& url, FolderEntryKind kind)
+{
+    RowDetails details;
+    const auto values = attributes(url);
+    details.name = values.optional<std::string>(AttributeKey::LocalizedName);
+    if (const auto* date = values.get<Date>(AttributeKey::ContentModificationDate))
+        details.text = services().formatters().date(*date, DateStyle::Medium, DateStyle::None);
+    appendPart(details.text, sizeText(url, kind, values));
+    if (values.flag(AttributeKey::IsShared))
+        appendPart(details.text, localized("Shared"));
+    const auto* status = values.get<DownloadingStatus>(AttributeKey::DownloadingStatus);
+    if (status && *status == DownloadingStatus::NotDownloaded)
+        details.download = ui::DownloadState::InCloud;
+    if (auto names = promisedItems().tagNames(url))
+        details.tagNames = std::move(*names.value);
+    return details;
+}
+
+} // namespace platform::components

@@ -1,0 +1,27 @@
+#pragma once
+
+#include "platform/FolderSnapshot.h"
+#include "platform/Url.h"
+#include "platform/ui/ListRow.h"
+
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace platform::components {
+
+/// What a row shows beyond what the listing knows. A value.
+struct RowDetails {
+    std::optional<std::string> name; ///< the localized name
+    std::string text; ///< date and size, or date and number of items, and whether it is shared
+    ui::DownloadState download = ui::DownloadState::Present;
+    std::vector<std::string> tagNames;
+
+    bool operator==(const RowDetails&) const = default;
+};
+
+/// Asks for the details of one item. Several system calls, and for a folder one pass over its names; any
+/// thread. What cannot be read is left out.
+RowDetails readRowDetails(const Url& url, FolderEntryKind kind);
+
+} // namespace platform::components
