@@ -1,0 +1,121 @@
+#pragma once
+
+#include "platform/CloudDocumentService.h"
+#include "platform/FileCoordinator.h"
+
+#include <functional>
+#include <memory>
+
+namespace items_tests {
+
+using platform::AttributeKeys;
+using platform::AttributeMap;
+using platform::Error;
+using platform::Result;
+using platform::Url;
+
+/// Refuses to coordinate, or sends readers to another location than the one they asked for.
+class DecoratedCoordinator : public platform::FileCoordinator {
+public:
+    std::optional<Error> refusal;
+    std::optional<Url> elsewhere;
+    int reads = 0;
+
+    explicit DecoratedCoordinator(std::shared_ptr<platform::FileCoordinator> real)
+        : _real(std::move(real))
+    {
+    }
+    std::optional<Error> coordinateReading(
+        const Url& url, platform::ReadingOptions options, const Accessor& accessor) override
+    {
+        ++reads;
+        return refusal ? refusal : _real->coordinateReading(elsewhere.value_or(url), options, accessor);
+    }
+
+private:
+    std::shared_ptr<platform::FileCoordinator> _real;
+};
+
+/// The real items, but for what a test changes of their attributes before they are handed out.
+class DecoratedItems : public platform::PromisedItems {
+public:
+    std::optional<Error> unreachable; ///< what every item's reachability answers, when it is set
+    std::function<void(const Url&, Result<AttributeMap>&)> changePromised;
+    std::function<void(const Url&, Result<AttributeMap>&)> changePlain;
+
+    explicit DecoratedItems(platform::PromisedItems& real)
+        : _real(real)
+    {
+    }
+    std::optional<Error> checkPromisedItemIsReachable(const Url& url) const override
+    {
+        return unreachable ? unreachable : _real.checkPromisedItemIsReachable(url);
+    }
+    Result<AttributeMap> promisedItemResourceValues(const Url& url, AttributeKeys keys) const override
+    {
+        auto values = _real.promisedItemResourceValues(url, keys);
+        if (changePromised)
+            changePromised(url, values);
+        return values;
+    }
+    Result<AttributeMap> resourceValues(const Url& url, AttributeKeys keys) const override
+    {
+        auto values = _real.resourceValues(url, keys);
+        if (changePlain)
+            changePlain(url, values);
+        return values;
+    }
+    Url physicalURLForPromise(const Url& url) const override { return _real.physicalURLForPromise(url); }
+    bool isItemPromise(const Url& url) const override { return _real.isItemPromise(url); }
+    Url logicalURLForPromise(const Url& url) const override { return _real.logicalURLForPromise(url); }
+    bool isExternalDocumentReference(const Url& url) const override
+    {
+        return _real.isExternalDocumentReference(url);
+    }
+    Result<Url> resolveExternalDocumentReference(const Url& url) const override
+    {
+        return _real.resolveExternalDocumentReference(url);
+    }
+    Result<Url> resolveAliasFile(const Url& url) const override { return _real.resolveAliasFile(url); }
+    Result<std::vector<std::string>> tagNames(const Url& url) const override { return _real.tagNames(url); }
+
+private:
+    platform::PromisedItems& _real;
+};
+
+/// Counts the accesses that were begun and ended; every location needs one while `isNeeded`.
+class CountingAccess : public platform::SecurityScopedAccess {
+public:
+    bool isNeeded = true;
+    int started = 0, stopped = 0;
+
+    bool startAccessing(const Url&) override
+    {
+        ++started;
+        return isNeeded;
+    }
+    void stopAccessing(const Url&) override { ++stopped; }
+};
+
+/// The real service with these in front of its roles.
+class DecoratedCloud : public platform::CloudDocumentService {
+public:
+    explicit DecoratedCloud(std::shared_ptr<platform::CloudDocumentService> real)
+        : decoratedItems(real->promisedItems())
+        , _real(std::move(real))
+    {
+    }
+    DecoratedItems decoratedItems;
+    CountingAccess access;
+
+    platform::CloudAccount& account() override { return _real->account(); }
+    platform::PromisedItems& promisedItems() override { return decoratedItems; }
+    platform::DocumentContainers& containers() override { return _real->containers(); }
+    platform::CloudItems& items() override { return _real->items(); }
+    platform::SecurityScopedAccess& securityScopedAccess() override { return access; }
+
+private:
+    std::shared_ptr<platform::CloudDocumentService> _real;
+};
+
+} // namespace items_tests

@@ -1,0 +1,47 @@
+#pragma once
+
+#include "host/drive/ItemFacts.h"
+#include "platform/Localization.h"
+#include "platform/PreviewSupport.h"
+#include "tests/items/support/DecoratedCloud.h"
+#include "tests/support/DriveFixture.h"
+
+#include <gtest/gtest.h>
+
+namespace items_tests {
+
+/// English texts, written from left to right unless a test wants it otherwise.
+class DirectedTexts : public platform::Localization {
+public:
+    bool rightToLeft = false;
+
+    std::string text(const std::string& key) const override { return key; }
+    std::string pluralText(const std::string& key, double) const override { return key; }
+    bool isRightToLeft() const override { return rightToLeft; }
+};
+
+/// A drive of its own for each test, with something in front of those of its roles that a test may want to
+/// fail or to change.
+class ItemsFixture : public testing::Test, public testing_support::DriveFixture {
+protected:
+    ItemsFixture();
+    ~ItemsFixture() override;
+
+    Url at(std::string_view relativePath) const { return url(relativePath); }
+    /// The documents folder of the default container.
+    Url root() const { return layout().defaultContainerURL(); }
+    /// Changes the promised attributes of every item.
+    void changeValues(std::function<void(const Url&, AttributeMap&)> change);
+    /// Writes what stands in a container's description, whether it makes sense or not; answers the
+    /// container's documents folder.
+    Url describeContainer(const std::string& identifier, const std::string& description) const;
+
+    std::shared_ptr<DecoratedCloud> decorated;
+    std::shared_ptr<DecoratedCoordinator> coordinator;
+    std::shared_ptr<DirectedTexts> texts = std::make_shared<DirectedTexts>();
+};
+
+/// Writes a file at a path, making the folders that lead to it; answers its location.
+Url writeFile(const std::string& path, std::string_view content);
+
+} // namespace items_tests
