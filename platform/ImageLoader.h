@@ -13,7 +13,7 @@ inline constexpr std::string_view image = "app.tarrow.Drive.image"; ///< codes: 
 } // namespace errorDomain
 
 enum class ImageErrorCode : int {
-    Damaged = 1, ///< the content is no picture, or breaks off
+    Damaged = 1, ///< the content is no picture (one that breaks off may show as far as it goes)
     TooLarge = 2, ///< more pixels or bytes than the limits allow to look at
 };
 
@@ -22,7 +22,7 @@ struct ImageLimits {
     int maxWidth = 4096, maxHeight = 4096; ///< pixels; a larger picture is made smaller, its shape kept
     double scale = 1; ///< pixels to a point of the result
     std::uint64_t maxFileBytes = 256ULL << 20; ///< a larger file is refused unread
-    std::uint64_t maxSourcePixels = 200'000'000; ///< a picture with more is refused when its header says so
+    std::uint64_t maxSourcePixels = 100'000'000; ///< a picture with more is refused when its header says so
 };
 
 /// Decodes picture files. Any thread; a call waits for the file and takes as long as the decoding.

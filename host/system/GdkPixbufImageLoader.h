@@ -1,0 +1,14 @@
+#pragma once
+
+#include "platform/ImageLoader.h"
+
+namespace host::system {
+
+/// Decodes pictures with the desktop's picture library, in the formats that are installed for it.
+class GdkPixbufImageLoader : public platform::ImageLoader {
+public:
+    platform::Result<platform::Image> load(
+        const std::string& path, const platform::ImageLimits& limits) const override;
+};
+
+} // namespace host::system
