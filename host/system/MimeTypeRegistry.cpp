@@ -1,0 +1,140 @@
+#include "host/system/MimeTypeRegistry.h"
+
+#include "host/system/TypeGraph.h"
+#include "host/system/TypeTable.h"
+
+#include <gio/gio.h>
+
+#include <array>
+#include <mutex>
+#include <shared_mutex>
+
+namespace host::system {
+
+namespace {
+
+// No extension in use is longer, and longer ones need no place in memory.
+constexpr std::size_t maximumExtension = 32;
+// Names that a program makes up must not fill the memory.
+constexpr std::size_t maximumCachedExtensions = 4096;
+
+using GlibText = std::unique_ptr<char, decltype(&g_free)>;
+
+/// An extension in lower case, without allocating.
+class LowerCase {
+public:
+    explicit LowerCase(std::string_view extension)
+        : _length(extension.size() <= maximumExtension ? extension.size() : 0)
+    {
+        for (std::size_t i = 0; i < _length; ++i)
+            _text[i] = g_ascii_tolower(extension[i]);
+    }
+    operator std::string_view() const { return {_text.data(), _length}; }
+
+private:
+    std::array<char, maximumExtension> _text;
+    std::size_t _length;
+};
+
+} // namespace
+
+/// The types of extensions that were asked for, unknown ones included.
+class MimeTypeRegistry::ExtensionCache {
+public:
+    using Answer = std::optional<std::string>;
+
+    std::optional<Answer> find(std::string_view extension) const
+    {
+        const std::shared_lock lock(_mutex);
+        const auto found = _types.find(extension);
+        return found == _types.end() ? std::nullopt : std::optional(found->second);
+    }
+    void add(std::string_view extension, const Answer& type)
+    {
+        const std::lock_guard lock(_mutex);
+        if (_types.size() < maximumCachedExtensions)
+            _types.emplace(extension, type);
+    }
+
+private:
+    mutable std::shared_mutex _mutex;
+    TextMap<Answer> _types;
+};
+
+MimeTypeRegistry::MimeTypeRegistry()
+    : _graph(std::make_unique<TypeGraph>())
+    , _extensions(std::make_unique<ExtensionCache>())
+{
+}
+
+MimeTypeRegistry::~MimeTypeRegistry() = default;
+
+std::optional<std::string> MimeTypeRegistry::typeForExtension(std::string_view extension) const
+{
+    const LowerCase lower(extension);
+    if (std::string_view(lower).empty())
+        return std::nullopt;
+    if (const auto* row = _graph->rowOfExtension(lower))
+        return std::string(row->identifier);
+    if (auto known = _extensions->find(lower))
+        return std::move(*known);
+    const auto name = "x." + std::string(std::string_view(lower));
+    const GlibText mime(g_content_type_guess(name.c_str(), nullptr, 0, nullptr), g_free);
+    std::optional<std::string> type;
+    if (!g_content_type_is_unknown(mime.get()))
+        type = typeForMimeType(mime.get());
+    _extensions->add(lower, type);
+    return type;
+}
+
+std::string MimeTypeRegistry::typeForMimeType(std::string_view mimeType) const
+{
+    if (const auto* row = _graph->rowOfMimeType(mimeType))
+        return std::string(row->identifier);
+    return std::string(TypeGraph::dynamicPrefix).append(mimeType);
+}
+
+bool MimeTypeRegistry::conformsTo(std::string_view type, std::string_view other) const
+{
+    return _graph->conformsTo(type, other);
+}
+
+bool MimeTypeRegistry::isPackageExtension(std::string_view extension) const
+{
+    const LowerCase lower(extension);
+    const auto* row = _graph->rowOfExtension(lower);
+    return row && _graph->conformsTo(row->identifier, platform::typeIdentifier::package);
+}
+
+std::optional<std::string> MimeTypeRegistry::mimeType(std::string_view type) const
+{
+    if (const auto* row = _graph->row(type)) {
+        const auto mimeTypes = words(row->mimeTypes);
+        return mimeTypes.empty() ? std::nullopt : std::optional<std::string>(mimeTypes.front());
+    }
+    if (type.starts_with(TypeGraph::dynamicPrefix))
+        return std::string(type.substr(TypeGraph::dynamicPrefix.size()));
+    return std::nullopt;
+}
+
+std::optional<std::string> MimeTypeRegistry::description(std::string_view type) const
+{
+    const auto mime = mimeType(type);
+    if (!mime)
+        return std::nullopt;
+    const GlibText text(g_content_type_get_description(mime->c_str()), g_free);
+    return text ? std::optional<std::string>(text.get()) : std::nullopt;
+}
+
+std::string MimeTypeRegistry::iconName(std::string_view type) const
+{
+    if (_graph->conformsTo(type, platform::typeIdentifier::directory)
+        && !_graph->conformsTo(type, platform::typeIdentifier::package))
+        return "folder";
+    const auto mime = mimeType(type);
+    // Themes have few icons of single types, and all of the general ones.
+    const GlibText name(mime ? g_content_type_get_generic_icon_name(mime->c_str()) : nullptr, g_free);
+    return name ? name.get() : "text-x-generic";
+}
+
+} // namespace host::system

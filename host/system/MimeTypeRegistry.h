@@ -1,0 +1,39 @@
+#pragma once
+
+#include "platform/TypeRegistry.h"
+
+#include <memory>
+#include <string>
+#include <string_view>
+
+namespace host::system {
+
+class TypeGraph;
+
+/// Types by the table of TypeTable.h and, beyond it, by the shared MIME database: there "dyn.mime.text/x-ada"
+/// is the identifier of the MIME type "text/x-ada". Everything is judged by names. Any thread; what was asked
+/// once is answered from memory.
+class MimeTypeRegistry : public platform::TypeRegistry {
+public:
+    MimeTypeRegistry();
+    ~MimeTypeRegistry() override;
+
+    std::optional<std::string> typeForExtension(std::string_view extension) const override;
+    bool conformsTo(std::string_view type, std::string_view other) const override;
+    std::optional<std::string> description(std::string_view type) const override;
+    std::string iconName(std::string_view type) const override;
+
+    /// Whether a folder with this extension is shown as one document.
+    bool isPackageExtension(std::string_view extension) const;
+    /// The preferred MIME type of a type; nothing for one that has none.
+    std::optional<std::string> mimeType(std::string_view type) const;
+    /// The type of a MIME type.
+    std::string typeForMimeType(std::string_view mimeType) const;
+
+private:
+    class ExtensionCache;
+    std::unique_ptr<TypeGraph> _graph;
+    std::unique_ptr<ExtensionCache> _extensions;
+};
+
+} // namespace host::system

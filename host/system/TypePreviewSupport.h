@@ -1,0 +1,26 @@
+#pragma once
+
+#include "platform/PreviewSupport.h"
+
+#include <memory>
+
+namespace platform {
+class TypeRegistry;
+}
+
+namespace host::system {
+
+/// Previews pictures, texts and sources, PDF documents, sound and movies, told by the name's extension.
+class TypePreviewSupport : public platform::PreviewSupport {
+public:
+    explicit TypePreviewSupport(std::shared_ptr<const platform::TypeRegistry> types)
+        : _types(std::move(types))
+    {
+    }
+    bool canPreview(const platform::Url& url) const override;
+
+private:
+    std::shared_ptr<const platform::TypeRegistry> _types;
+};
+
+} // namespace host::system
