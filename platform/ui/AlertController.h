@@ -54,6 +54,9 @@ public:
     /// Escape or a tap beside the alert.
     void userCancelled() override;
 
+    void loadView() override;
+    void viewDidAppear(bool animated) override; ///< the first field takes the focus
+
 private:
     void alertChanged();
 
@@ -64,6 +67,7 @@ private:
     std::vector<std::shared_ptr<TextField>> _textFields;
     std::shared_ptr<ViewController> _content;
     ObserverSlot<AlertObserver> _alertObserver;
+    bool _isClosing = false;
 };
 
 } // namespace platform::ui

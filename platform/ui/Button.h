@@ -37,9 +37,11 @@ public:
     double firstBaselineOffset() const override;
     double lastBaselineOffset() const override;
     void layoutSubviews() override;
+    void sizeToFit() override;
 
 private:
     void contentDidChange();
+    void placeTitle();
 
     std::shared_ptr<Label> _titleLabel;
     std::optional<Image> _image;

@@ -1,16 +1,12 @@
 #pragma once
 
 #include "platform/Geometry.h"
-#include "platform/ui/LayoutSolver.h"
 
-#include <array>
 #include <memory>
-#include <optional>
-#include <unordered_map>
-#include <vector>
 
 namespace platform::ui {
 
+class LayoutConstraint;
 class View;
 
 /// Lays out one tree of views: brings the active constraints and the wanted sizes into a solver, reads the
@@ -20,22 +16,23 @@ public:
     explicit LayoutEngine(View& root);
     ~LayoutEngine();
 
-    /// Which views or constraints there are has changed.
-    void structureDidChange() { _structureIsStale = true; }
+    /// Which views, constraints or priorities there are has changed.
+    void structureDidChange();
     void constantDidChange(const LayoutConstraint& constraint);
-    void constraintDidChange(const LayoutConstraint& constraint);
-    void intrinsicSizeDidChange(View& view);
-    /// A view that is placed by its frame got another one.
-    void frameDidChange(View& view);
+    void intrinsicSizeDidChange(const View& view);
+    /// A view that is placed by its frame, or the root, got another one.
+    void frameDidChange(const View& view);
 
-    /// One layout of everything that is stale. Ends also when the views' answers do not settle.
+    /// Lays out everything that is stale. Ends also when the views' answers do not settle. A call from within
+    /// a layout does nothing.
     void layout();
+    bool isRunning() const;
+    /// The smallest size of the root; a positive target side is kept. For an engine that does nothing else.
     Size fittingSize(Size target);
 
 private:
     struct Impl;
     std::unique_ptr<Impl> _impl;
-    bool _structureIsStale = true;
 };
 
 } // namespace platform::ui

@@ -76,6 +76,7 @@ public:
 
 protected:
     virtual void layoutInputDidChange() = 0; ///< priorities, constraints or the kind of placement
+    virtual void constraintConstantDidChange(const LayoutConstraint& constraint) = 0;
 
 private:
     friend class LayoutConstraint;

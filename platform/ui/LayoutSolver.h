@@ -6,6 +6,7 @@
 #include <memory>
 #include <optional>
 #include <span>
+#include <vector>
 
 namespace platform::ui {
 
@@ -39,19 +40,22 @@ public:
     std::optional<ConstraintId> addConstraint(
         std::span<const Term> terms, LayoutRelation relation, double constant, LayoutPriority priority);
     void removeConstraint(ConstraintId id);
-    /// False when the constraint is required and the new constant contradicts what is required: the
-    /// constraint is then removed, as `removeConstraint` does.
-    bool setConstant(ConstraintId id, double constant);
+    /// Takes effect with the next `solve`.
+    void setConstant(ConstraintId id, double constant);
 
     /// Wishes a value for a variable; suggesting another one later is cheap. The priority is below 1000.
     ConstraintId addEdit(Variable variable, LayoutPriority priority);
     void suggest(ConstraintId edit, double value) { setConstant(edit, value); }
 
+    /// Brings the values up to date. Answers the required constraints that had to be given up, because
+    /// constants that were set contradict each other; they are removed, the younger before the older.
+    std::vector<ConstraintId> solve();
+    /// As of the last `solve`.
     double value(Variable variable) const;
 
 private:
-    class Tableau;
-    std::unique_ptr<Tableau> _tableau;
+    struct Impl;
+    std::unique_ptr<Impl> _impl;
 };
 
 } // namespace platform::ui

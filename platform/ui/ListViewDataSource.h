@@ -16,8 +16,9 @@ public:
     virtual std::size_t numberOfRows(const ListView& list) const = 0;
     /// `index` is below the number of rows.
     virtual ListRow rowAtIndex(const ListView& list, std::size_t index) const = 0;
-    /// The same identifier that `rowAtIndex` answers, without making the row.
+    /// The same identifier and kind that `rowAtIndex` answers, without making the row.
     virtual RowId rowIdAtIndex(const ListView& list, std::size_t index) const = 0;
+    virtual RowKind rowKindAtIndex(const ListView&, std::size_t /*index*/) const { return RowKind::Item; }
 };
 
 } // namespace platform::ui

@@ -18,8 +18,6 @@ struct BarFrames {
 /// movement when a host shows one, and come at once otherwise.
 class NavigationController : public ViewController {
 public:
-    NavigationController();
-
     void accept(ViewControllerVisitor& visitor) override;
     void setNavigationObserver(std::weak_ptr<NavigationObserver> observer);
     void setDelegate(std::weak_ptr<NavigationControllerDelegate> delegate)
@@ -54,27 +52,32 @@ public:
     void screenResized(ViewController& screen, Size size);
     void barsResized(const BarFrames& frames);
 
-    void loadView() override;
+    bool backRequested() override;
+
+    // Overriders call these.
     void viewWillLayoutSubviews() override;
     std::vector<std::shared_ptr<ViewController>> appearingChildren() const override;
     void viewWillAppear(bool animated) override;
     void viewDidAppear(bool animated) override;
 
 private:
-    void replaceStack(
-        std::vector<std::shared_ptr<ViewController>> screens, NavigationKind kind, bool animated);
-    void startTransition(NavigationTransition transition);
+    using Screens = std::vector<std::shared_ptr<ViewController>>;
+
+    std::shared_ptr<NavigationController> asNavigationController() override;
+    void replaceStack(Screens screens, NavigationKind kind, bool animated);
+    void adopt(Screens screens, const std::shared_ptr<ViewController>& leaving);
+    void startTransition(const NavigationTransition& transition);
     void endTransition(const NavigationTransition& transition);
     void showTopView();
-    void tellWillShow(bool animated);
-    void tellDidShow(bool animated);
+    bool isShown() const;
+    void tellDidShow(const std::shared_ptr<ViewController>& screen, bool animated);
 
     std::weak_ptr<NavigationControllerDelegate> _delegate;
     ObserverSlot<NavigationObserver> _navigationObserver;
     TransitionToken _transition;
-    std::weak_ptr<ViewController> _announced;
+    std::weak_ptr<ViewController> _announced; ///< the screen that the delegate was told of last
     BarFrames _barFrames;
-    bool _toolbarHidden = true;
+    bool _toolbarHidden = true, _hostSizesScreens = false;
 };
 
 } // namespace platform::ui

@@ -35,6 +35,9 @@ public:
     void setSearchAction(std::function<void()> action);
 
 private:
+    template <typename T>
+    void set(T& field, T value);
+
     std::function<void()> _onChange;
     std::string _title, _subtitle;
     BarButtonItems _leftItems, _rightItems;

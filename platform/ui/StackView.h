@@ -5,12 +5,12 @@
 namespace platform::ui {
 
 enum class StackAlignment { Fill, Leading, Center, Trailing, FirstBaseline };
-enum class StackDistribution { Fill, FillEqually, FillProportionally, EqualSpacing };
+enum class StackDistribution { Fill, FillEqually, FillProportionally };
 
 /// Arranges views in a row or a column by constraints of its own. Hidden views take no room.
 class StackView : public View {
 public:
-    explicit StackView(std::vector<std::shared_ptr<View>> arranged = {}, Axis axis = Axis::Horizontal);
+    explicit StackView(Axis axis = Axis::Horizontal);
 
     const std::vector<std::shared_ptr<View>>& arrangedSubviews() const { return _arranged; }
     void addArrangedSubview(const std::shared_ptr<View>& view);

@@ -98,7 +98,7 @@ public:
     void invalidateIntrinsicContentSize() override;
     LayoutAnchor anchor(LayoutAttribute attribute) const override;
     virtual Size sizeThatFits(Size limit) const; ///< a limit of 0: none
-    void sizeToFit(); ///< keeps the origin
+    virtual void sizeToFit(); ///< keeps the origin
     /// The smallest size that the constraints below allow; a positive target side is kept.
     Size systemLayoutSizeFitting(Size target);
     /// The root of a layout of its own: constraints inside have nothing to do with views outside.
@@ -106,6 +106,7 @@ public:
 
     virtual bool becomeFirstResponder() { return false; } ///< a plain view never takes the focus
     virtual bool resignFirstResponder() { return true; }
+    void endEditing(); ///< the focus leaves this view and everything below, where that is allowed
 
 protected:
     void changed(ViewChanges changes);
@@ -113,16 +114,22 @@ protected:
     std::optional<Size> nativeSize(double maxWidth) const;
     void setBoundsOrigin(Point origin);
     void layoutInputDidChange() override;
+    void constraintConstantDidChange(const LayoutConstraint& constraint) override;
     virtual void subviewVisibilityDidChange() { }
     virtual void willRemoveSubview(View&) { }
 
 private:
+    friend class LayoutConstraint;
     friend class LayoutEngine;
     friend class ViewController;
 
     View& layoutRoot();
     LayoutEngine& engine();
     void markTreeForLayout();
+    void traitsDidChange();
+    void resizeWithSuperview(double widthChange, double heightChange);
+    void deactivateConstraintsCrossing(const View& part);
+    Point originInRoot() const;
 
     Rect _frame;
     Point _boundsOrigin;

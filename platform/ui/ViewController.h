@@ -94,6 +94,9 @@ public:
     /// Event up: the user asks to leave this presented screen (Escape, a tap beside it). The default
     /// dismisses it.
     virtual void userCancelled();
+    /// Event up: the user asks to go back within this screen. The default presses the Cancel button of the
+    /// navigation bar. False: there is nothing to go back to.
+    virtual bool backRequested();
 
     const std::string& restorationIdentifier() const
     {
@@ -113,8 +116,13 @@ protected:
     void barsChanged();
 
 private:
-    struct PresentationState;
-    std::shared_ptr<ViewController> presentationRoot();
+    friend class NavigationController;
+    friend class Window;
+
+    virtual std::shared_ptr<NavigationController> asNavigationController() { return nullptr; }
+    std::shared_ptr<ViewController> presentationRoot() const;
+    void finishTransition() const;
+    void tellTraits(const TraitCollection& previous);
 
     std::shared_ptr<View> _view;
     std::string _title, _restorationIdentifier;
@@ -126,7 +134,7 @@ private:
     PresentationStyle _presentationStyle = PresentationStyle::FullScreen;
     PopoverAnchor _popoverAnchor;
     AppearanceState _appearance = AppearanceState::Disappeared;
-    bool _animatedAppearance = false;
+    bool _animatedAppearance = false, _isLoading = false;
     ObserverSlot<ViewControllerObserver> _observer;
 };
 

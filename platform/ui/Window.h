@@ -54,18 +54,25 @@ public:
     void closed();
 
     // For view controllers.
+    void finishTransition() { _transition.finish(); }
     void present(const Presentation& presentation, std::function<void()> completion);
-    void dismiss(const Presentation& presentation, std::function<void()> completion);
+    /// The screens have been taken off the model, the topmost comes last; the first one was presented by
+    /// `presenting`.
+    void dismiss(std::vector<Presentation> presentations, std::function<void()> completion);
 
 private:
+    using Screens = std::vector<std::shared_ptr<ViewController>>;
+
     void attach(ViewController& screen);
-    void applyTraits(ViewController& screen);
+    void dismissOne(const Presentation& presentation, std::function<void()> completion);
+    void show(const Presentation& presentation, std::function<void()> completion);
 
     Rect _bounds;
     TraitCollection _traits;
     std::optional<Color> _background;
     std::shared_ptr<ViewController> _root;
     ObserverSlot<WindowObserver> _observer;
+    TransitionToken _transition;
     bool _visible = false, _key = false;
 };
 

@@ -1,0 +1,69 @@
+#pragma once
+
+#include <cmath>
+#include <cstdint>
+#include <vector>
+
+namespace platform::ui {
+
+/// A linear expression of few of many columns: constant + sum of coefficient * column.
+class SparseRow {
+public:
+    using Column = std::uint32_t;
+
+    struct Cell {
+        Column column;
+        double coefficient;
+    };
+
+    /// What is smaller counts as 0; far below any length that can be seen.
+    static constexpr double epsilon = 1e-8;
+    static bool isNearZero(double value) { return std::abs(value) < epsilon; }
+
+    double constant = 0;
+
+    /// Sorted by column.
+    const std::vector<Cell>& cells() const { return _cells; }
+    double coefficient(Column column) const; ///< 0 for a column that is not there
+    void add(Column column, double coefficient);
+    /// Removes a column and answers its coefficient.
+    double take(Column column);
+    void scale(double factor);
+    /// From 0 = this row to column = this row.
+    void solveFor(Column column);
+    /// From `from` = this row to `to` = this row.
+    void solveFor(Column from, Column to);
+
+    /// Adds another row times a factor; `onNew` hears of each column that was not there before.
+    template <typename OnNew>
+    void addScaled(const SparseRow& other, double factor, OnNew&& onNew);
+
+private:
+    std::vector<Cell>::iterator find(Column column);
+
+    std::vector<Cell> _cells;
+};
+
+template <typename OnNew>
+void SparseRow::addScaled(const SparseRow& other, double factor, OnNew&& onNew)
+{
+    constant += factor * other.constant;
+    thread_local std::vector<Cell> merged;
+    merged.clear();
+    auto mine = _cells.begin();
+    for (const auto& cell : other._cells) {
+        while (mine != _cells.end() && mine->column < cell.column)
+            merged.push_back(*mine++);
+        const bool isThere = mine != _cells.end() && mine->column == cell.column;
+        const double sum = factor * cell.coefficient + (isThere ? mine++->coefficient : 0);
+        if (isNearZero(sum))
+            continue;
+        merged.push_back({cell.column, sum});
+        if (!isThere)
+            onNew(cell.column);
+    }
+    merged.insert(merged.end(), mine, _cells.end());
+    _cells.assign(merged.begin(), merged.end());
+}
+
+} // namespace platform::ui
