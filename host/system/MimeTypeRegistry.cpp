@@ -20,12 +20,14 @@ constexpr std::size_t maximumCachedExtensions = 4096;
 
 using GlibText = std::unique_ptr<char, decltype(&g_free)>;
 
-/// An extension in lower case, without allocating.
+/// An extension in lower case, without allocating; empty for what can be none.
 class LowerCase {
 public:
     explicit LowerCase(std::string_view extension)
         : _length(extension.size() <= maximumExtension ? extension.size() : 0)
     {
+        if (extension.find_first_of(std::string_view("/\0", 2)) != std::string_view::npos)
+            _length = 0;
         for (std::size_t i = 0; i < _length; ++i)
             _text[i] = g_ascii_tolower(extension[i]);
     }
@@ -43,11 +45,15 @@ class MimeTypeRegistry::ExtensionCache {
 public:
     using Answer = std::optional<std::string>;
 
-    std::optional<Answer> find(std::string_view extension) const
+    /// Whether the extension was asked for before; `type` is then what the answer was.
+    bool find(std::string_view extension, Answer& type) const
     {
         const std::shared_lock lock(_mutex);
         const auto found = _types.find(extension);
-        return found == _types.end() ? std::nullopt : std::optional(found->second);
+        if (found == _types.end())
+            return false;
+        type = found->second;
+        return true;
     }
     void add(std::string_view extension, const Answer& type)
     {
@@ -76,11 +82,11 @@ std::optional<std::string> MimeTypeRegistry::typeForExtension(std::string_view e
         return std::nullopt;
     if (const auto* row = _graph->rowOfExtension(lower))
         return std::string(row->identifier);
-    if (auto known = _extensions->find(lower))
-        return std::move(*known);
+    std::optional<std::string> type;
+    if (_extensions->find(lower, type))
+        return type;
     const auto name = "x." + std::string(std::string_view(lower));
     const GlibText mime(g_content_type_guess(name.c_str(), nullptr, 0, nullptr), g_free);
-    std::optional<std::string> type;
     if (!g_content_type_is_unknown(mime.get()))
         type = typeForMimeType(mime.get());
     _extensions->add(lower, type);
