@@ -1,0 +1,255 @@
+#include "host/gtk/ListRowWidget.h"
+
+#include "host/gtk/ImagePaint.h"
+
+#include <algorithm>
+#include <memory>
+#include <numbers>
+
+namespace {
+
+namespace ui = platform::ui;
+
+constexpr int iconSize = 32, smallIconSize = 16;
+constexpr int dotDiameter = 10, dotStep = 7; ///< dots of several tags overlap
+
+struct TrwListRow {
+    GtkWidget parent;
+    GtkListItem* item; ///< owns this widget
+    GtkWidget *check, *icon, *title, *detail, *dots, *download, *progress, *chevron;
+    ui::ListRow* shown;
+    bool isFilled;
+};
+
+struct TrwListRowClass {
+    GtkWidgetClass parent;
+};
+
+G_DEFINE_TYPE(TrwListRow, trw_list_row, GTK_TYPE_WIDGET)
+
+TrwListRow* rowOf(gpointer widget)
+{
+    return static_cast<TrwListRow*>(widget);
+}
+
+void activate(GtkWidget* widget, const char*, GVariant*)
+{
+    gtk_widget_activate_action(
+        widget, "list.activate-item", "u", gtk_list_item_get_position(rowOf(widget)->item));
+}
+
+void dispose(GObject* object)
+{
+    auto* widget = GTK_WIDGET(object);
+    while (GtkWidget* child = gtk_widget_get_first_child(widget))
+        gtk_widget_unparent(child);
+    G_OBJECT_CLASS(trw_list_row_parent_class)->dispose(object);
+}
+
+void finalize(GObject* object)
+{
+    delete rowOf(object)->shown;
+    G_OBJECT_CLASS(trw_list_row_parent_class)->finalize(object);
+}
+
+void drawDots(GtkDrawingArea*, cairo_t* cairo, int /*width*/, int height, gpointer data)
+{
+    const auto& colors = rowOf(data)->shown->tagColors;
+    for (std::size_t i = 0; i < colors.size(); ++i) {
+        const double x = static_cast<double>(i) * dotStep + dotDiameter / 2.0;
+        cairo_set_source_rgba(cairo, colors[i].red, colors[i].green, colors[i].blue, colors[i].alpha);
+        cairo_arc(cairo, x, height / 2.0, dotDiameter / 2.0 - 0.5, 0, 2 * std::numbers::pi);
+        cairo_fill_preserve(cairo);
+        cairo_set_source_rgba(cairo, 0, 0, 0, 0.2);
+        cairo_set_line_width(cairo, 0.5);
+        cairo_stroke(cairo);
+    }
+}
+
+void drawProgress(GtkDrawingArea* area, cairo_t* cairo, int width, int height, gpointer data)
+{
+    GdkRGBA color;
+    gtk_style_context_get_color(gtk_widget_get_style_context(GTK_WIDGET(area)), &color);
+    const double radius = std::min(width, height) / 2.0 - 1, turn = 2 * std::numbers::pi;
+    const double start = -turn / 4, done = std::clamp(rowOf(data)->shown->downloadProgress, 0.0, 1.0);
+    cairo_set_line_width(cairo, 1);
+    gdk_cairo_set_source_rgba(cairo, &color);
+    cairo_arc(cairo, width / 2.0, height / 2.0, radius, 0, turn);
+    cairo_stroke(cairo);
+    cairo_move_to(cairo, width / 2.0, height / 2.0);
+    cairo_arc(cairo, width / 2.0, height / 2.0, radius, start, start + turn * done);
+    cairo_fill(cairo);
+}
+
+void trw_list_row_class_init(TrwListRowClass* type)
+{
+    G_OBJECT_CLASS(type)->dispose = dispose;
+    G_OBJECT_CLASS(type)->finalize = finalize;
+    auto* widget = GTK_WIDGET_CLASS(type);
+    gtk_widget_class_set_layout_manager_type(widget, GTK_TYPE_BOX_LAYOUT);
+    gtk_widget_class_set_accessible_role(widget, GTK_ACCESSIBLE_ROLE_BUTTON);
+    gtk_widget_class_set_css_name(widget, "kit-row");
+    gtk_widget_class_install_action(widget, "row.activate", nullptr, activate);
+}
+
+GtkWidget* label(const char* styleClass, PangoEllipsizeMode ellipsize)
+{
+    auto* made = gtk_label_new(nullptr);
+    gtk_label_set_xalign(GTK_LABEL(made), 0);
+    gtk_label_set_ellipsize(GTK_LABEL(made), ellipsize);
+    gtk_widget_add_css_class(made, styleClass);
+    return made;
+}
+
+GtkWidget* append(TrwListRow* row, GtkWidget* child)
+{
+    gtk_widget_set_valign(child, GTK_ALIGN_CENTER);
+    gtk_widget_set_parent(child, GTK_WIDGET(row));
+    return child;
+}
+
+GtkWidget* drawing(TrwListRow* row, GtkDrawingAreaDrawFunc draw, int width, int height)
+{
+    auto* area = gtk_drawing_area_new();
+    gtk_drawing_area_set_content_width(GTK_DRAWING_AREA(area), width);
+    gtk_drawing_area_set_content_height(GTK_DRAWING_AREA(area), height);
+    gtk_drawing_area_set_draw_func(GTK_DRAWING_AREA(area), draw, row, nullptr);
+    return append(row, area);
+}
+
+GtkWidget* texts(TrwListRow* row)
+{
+    auto* box = gtk_box_new(GTK_ORIENTATION_VERTICAL, 2);
+    gtk_widget_set_hexpand(box, TRUE);
+    row->title = label("title", PANGO_ELLIPSIZE_MIDDLE);
+    row->detail = label("detail", PANGO_ELLIPSIZE_END);
+    gtk_box_append(GTK_BOX(box), row->title);
+    gtk_box_append(GTK_BOX(box), row->detail);
+    return box;
+}
+
+void trw_list_row_init(TrwListRow* row)
+{
+    row->shown = new ui::ListRow();
+    auto* check = gtk_check_button_new();
+    gtk_widget_add_css_class(check, "selection-mode");
+    gtk_widget_set_can_target(check, FALSE);
+    gtk_widget_set_focusable(check, FALSE);
+    row->check = append(row, check);
+    row->icon = append(row, gtk_image_new());
+    append(row, texts(row));
+    row->dots = drawing(row, drawDots, dotDiameter, dotDiameter);
+    row->download = append(row, gtk_image_new_from_icon_name("trw-in-cloud-symbolic"));
+    row->progress = drawing(row, drawProgress, smallIconSize, smallIconSize);
+    row->chevron = append(row, gtk_image_new_from_icon_name("go-next-symbolic"));
+    for (auto* dimmed : {row->download, row->progress, row->chevron})
+        gtk_widget_add_css_class(dimmed, "dim-label");
+}
+
+void showTexts(TrwListRow* row, const ui::ListRow& content)
+{
+    gtk_label_set_label(GTK_LABEL(row->title), content.title.c_str());
+    gtk_label_set_label(GTK_LABEL(row->detail), content.detail.c_str());
+    gtk_widget_set_visible(row->detail, !content.detail.empty());
+}
+
+void showMarks(TrwListRow* row, const ui::ListRow& content)
+{
+    gtk_widget_set_visible(row->check, content.check != ui::CheckState::None);
+    gtk_check_button_set_active(GTK_CHECK_BUTTON(row->check), content.check == ui::CheckState::On);
+    gtk_widget_set_visible(row->download, content.download == ui::DownloadState::InCloud);
+    gtk_widget_set_visible(row->progress, content.download == ui::DownloadState::Downloading);
+    gtk_widget_queue_draw(row->progress);
+    gtk_widget_set_visible(row->chevron,
+        content.accessory == ui::RowAccessory::Disclosure && content.check == ui::CheckState::None);
+    const int dots = static_cast<int>(content.tagColors.size());
+    gtk_widget_set_visible(row->dots, dots > 0);
+    gtk_drawing_area_set_content_width(
+        GTK_DRAWING_AREA(row->dots), dotDiameter + std::max(0, dots - 1) * dotStep);
+    gtk_widget_queue_draw(row->dots);
+}
+
+void showIcon(TrwListRow* row, const ui::ListRow& content)
+{
+    gtk_widget_set_visible(row->icon, content.image.has_value());
+    if (content.image)
+        host::gtk::ImagePaint::show(GTK_IMAGE(row->icon), *content.image, iconSize);
+}
+
+void showStyle(TrwListRow* row, const ui::ListRow& content)
+{
+    const auto setClass = [row](const char* name, bool wanted) {
+        if (wanted)
+            gtk_widget_add_css_class(GTK_WIDGET(row), name);
+        else
+            gtk_widget_remove_css_class(GTK_WIDGET(row), name);
+    };
+    setClass("section", content.kind == ui::RowKind::SectionHeader);
+    setClass("dimmed", content.isDimmed);
+    gtk_list_item_set_activatable(row->item, content.kind == ui::RowKind::Item);
+}
+
+void showAccessible(TrwListRow* row, const ui::ListRow& content)
+{
+    std::string name = content.accessibleDescription;
+    if (name.empty())
+        name = content.detail.empty() ? content.title : content.title + ", " + content.detail;
+    gtk_accessible_update_property(GTK_ACCESSIBLE(row), GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
+    if (content.check == ui::CheckState::None)
+        gtk_accessible_reset_state(GTK_ACCESSIBLE(row), GTK_ACCESSIBLE_STATE_PRESSED);
+    else
+        gtk_accessible_update_state(GTK_ACCESSIBLE(row), GTK_ACCESSIBLE_STATE_PRESSED,
+            content.check == ui::CheckState::On ? GTK_ACCESSIBLE_TRISTATE_TRUE
+                                                : GTK_ACCESSIBLE_TRISTATE_FALSE,
+            -1);
+}
+
+} // namespace
+
+namespace host::gtk::ListRowWidget {
+
+GtkWidget* make(GtkListItem* item)
+{
+    auto* row = rowOf(g_object_new(trw_list_row_get_type(), nullptr));
+    row->item = item;
+    return GTK_WIDGET(row);
+}
+
+bool isRow(GtkWidget* widget)
+{
+    return G_TYPE_CHECK_INSTANCE_TYPE(widget, trw_list_row_get_type());
+}
+
+void show(GtkWidget* widget, const ui::ListRow& content, double height)
+{
+    auto* row = rowOf(widget);
+    gtk_widget_set_size_request(widget, -1, static_cast<int>(height));
+    if (row->isFilled && *row->shown == content)
+        return;
+    const bool sameIcon = row->isFilled && row->shown->image == content.image;
+    *row->shown = content;
+    showTexts(row, content);
+    showMarks(row, content);
+    if (!sameIcon)
+        showIcon(row, content);
+    showStyle(row, content);
+    showAccessible(row, content);
+    row->isFilled = true;
+}
+
+const ui::ListRow& shown(GtkWidget* row)
+{
+    return *rowOf(row)->shown;
+}
+
+guint position(GtkWidget* row)
+{
+    return gtk_list_item_get_position(rowOf(row)->item);
+}
+
+const char* titleText(GtkWidget* row)
+{
+    return gtk_label_get_label(GTK_LABEL(rowOf(row)->title));
+}
+
+} // namespace host::gtk::ListRowWidget

@@ -1,0 +1,59 @@
+#pragma once
+
+#include "host/gtk/ViewPeer.h"
+#include "platform/ui/ListView.h"
+
+#include <unordered_set>
+
+namespace host::gtk {
+
+/// A GtkListView over a lazy model: only rows near the visible ones have widgets.
+class ListViewPeer : public ViewPeer,
+                     public platform::ui::ScrollObserver,
+                     public platform::ui::ListViewObserver {
+public:
+    ListViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::ListView>& list);
+    ~ListViewPeer() override;
+
+    void scrollTo(platform::ui::ScrollView& view, platform::Point offset, bool animated) override;
+    void scrollExtentDidChange(platform::ui::ScrollView& view) override;
+    void rowsWereReset(platform::ui::ListView& list) override;
+    void rowsDidChange(platform::ui::ListView& list, const platform::ui::ListChanges& changes) override;
+    void rowDidChange(platform::ui::ListView& list, std::size_t index) override;
+    void selectionDidChange(platform::ui::ListView& list) override;
+    void scrollToRow(platform::ui::ListView& list, std::size_t index, platform::ui::RowPosition position,
+        bool animated) override;
+    void refreshStateDidChange(platform::ui::ListView& list) override;
+
+    bool grabFocus() override;
+    GtkWidget* listWidget() const { return _listWidget; }
+    /// The widgets of the rows that exist now, in no order.
+    std::vector<GtkWidget*> liveRows() const;
+
+protected:
+    GtkWidget* childContainer() const override { return widget(); }
+    platform::Point childOrigin() const override { return {}; }
+    void mirror(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+
+private:
+    void buildWidgets();
+    void connectFactory(GtkListItemFactory* factory);
+    void connectInput();
+    void setUpRow(GtkListItem* item);
+    void bindRow(GtkListItem* item);
+    void activated(guint position);
+    void scrolled();
+    void refreshRowsLater();
+    void refreshRows();
+    bool keyPressed(guint key, GdkModifierType modifiers);
+    void showMenuOf(GtkWidget* row, double x, double y);
+
+    std::weak_ptr<platform::ui::ListView> _list;
+    ObjectRef<GListModel> _rows;
+    GtkWidget *_listWidget = nullptr, *_window = nullptr, *_refresher = nullptr, *_spinner = nullptr;
+    std::unordered_set<GtkListItem*> _live;
+    SignalConnection _onScroll;
+    int _refreshKey = 0; ///< its address names the refreshing of rows in the scheduler
+};
+
+} // namespace host::gtk

@@ -1,0 +1,13 @@
+#pragma once
+
+#include "platform/ui/Menu.h"
+
+#include <gtk/gtk.h>
+
+namespace host::gtk {
+
+/// Shows a context menu at a point of a widget. It ends by itself when it is closed; an entry's handler runs
+/// after that.
+void showMenu(GtkWidget* parent, double x, double y, const platform::ui::Menu& menu);
+
+} // namespace host::gtk

@@ -1,0 +1,101 @@
+#include "host/gtk/NavigationBarPeer.h"
+
+#include "host/gtk/ButtonPeer.h"
+#include "platform/Localization.h"
+#include "platform/ui/NavigationItem.h"
+
+#include <adwaita.h>
+
+namespace host::gtk {
+
+namespace ui = platform::ui;
+
+namespace {
+
+GtkWidget* makeIconButton(const char* icon, const std::string& name)
+{
+    auto* button = makeTouchButton();
+    gtk_button_set_icon_name(GTK_BUTTON(button), icon);
+    gtk_accessible_update_property(GTK_ACCESSIBLE(button), GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
+    gtk_widget_set_tooltip_text(button, name.c_str());
+    return button;
+}
+
+} // namespace
+
+NavigationBarPeer::NavigationBarPeer(std::shared_ptr<PeerContext> context)
+    : _context(std::move(context))
+    , _bar(ObjectRef<GtkWidget>::retain(adw_header_bar_new()))
+    , _title(adw_window_title_new("", ""))
+    , _back(makeIconButton("go-previous-symbolic", platform::localized("Back")))
+    , _search(makeIconButton("system-search-symbolic", platform::localized("Search")))
+{
+    auto* bar = ADW_HEADER_BAR(widget());
+    adw_header_bar_set_title_widget(bar, _title);
+    adw_header_bar_pack_start(bar, _back);
+    adw_header_bar_pack_end(bar, _search);
+    _connections.push_back(connectSignal<void()>(_back, "clicked", [this] {
+        if (const auto call = _onBack)
+            call();
+    }));
+    _connections.push_back(connectSignal<void()>(_search, "clicked", [this] {
+        if (const auto call = _onSearch)
+            call();
+    }));
+}
+
+NavigationBarPeer::~NavigationBarPeer()
+{
+    _connections.clear();
+    clearItems();
+}
+
+void NavigationBarPeer::show(const ui::NavigationItem& item, bool hasBackTarget)
+{
+    adw_window_title_set_title(ADW_WINDOW_TITLE(_title), item.title().c_str());
+    adw_window_title_set_subtitle(ADW_WINDOW_TITLE(_title), item.subtitle().c_str());
+    const bool replaced = !item.leftItems().empty() && !item.leftItemsSupplementBackButton();
+    gtk_widget_set_visible(_back, hasBackTarget && !item.hidesBackButton() && !replaced);
+    showSearch(item);
+    if (item.leftItems() != _left || item.rightItems() != _right)
+        showItems(item);
+}
+
+void NavigationBarPeer::showSearch(const ui::NavigationItem& item)
+{
+    _onSearch = item.searchAction();
+    gtk_widget_set_visible(_search, static_cast<bool>(_onSearch));
+}
+
+void NavigationBarPeer::clearItems()
+{
+    for (auto& peer : std::exchange(_peers, {})) {
+        adw_header_bar_remove(ADW_HEADER_BAR(widget()), peer->widget());
+        _context->scheduler().release(std::move(peer));
+    }
+}
+
+void NavigationBarPeer::showItems(const ui::NavigationItem& item)
+{
+    clearItems();
+    _left = item.leftItems();
+    _right = item.rightItems();
+    const auto add = [this](const std::shared_ptr<ui::BarButtonItem>& entry, auto pack) {
+        if (entry->isSpace())
+            return;
+        _peers.push_back(BarItemPeer::make(_context, entry));
+        pack(ADW_HEADER_BAR(widget()), _peers.back()->widget());
+    };
+    for (const auto& entry : _left)
+        add(entry, adw_header_bar_pack_start);
+    for (const auto& entry : _right)
+        add(entry, adw_header_bar_pack_end);
+}
+
+void NavigationBarPeer::setWindowButtons(bool shown)
+{
+    adw_header_bar_set_show_start_title_buttons(ADW_HEADER_BAR(widget()), shown);
+    adw_header_bar_set_show_end_title_buttons(ADW_HEADER_BAR(widget()), shown);
+}
+
+} // namespace host::gtk

@@ -1,0 +1,43 @@
+#pragma once
+
+#include "host/gtk/BarItemPeer.h"
+
+#include <functional>
+#include <vector>
+
+namespace platform::ui {
+class NavigationItem;
+}
+
+namespace host::gtk {
+
+/// The bar at the top of a screen.
+class NavigationBarPeer {
+public:
+    explicit NavigationBarPeer(std::shared_ptr<PeerContext> context);
+    ~NavigationBarPeer();
+
+    GtkWidget* widget() const { return _bar.get(); }
+    GtkWidget* backButton() const { return _back; }
+    void setOnBack(std::function<void()> callback) { _onBack = std::move(callback); }
+
+    /// `hasBackTarget` says whether there is a screen to go back to.
+    void show(const platform::ui::NavigationItem& item, bool hasBackTarget);
+    /// Whether the window's own buttons stand in this bar.
+    void setWindowButtons(bool shown);
+
+private:
+    void showItems(const platform::ui::NavigationItem& item);
+    void showSearch(const platform::ui::NavigationItem& item);
+    void clearItems();
+
+    std::shared_ptr<PeerContext> _context;
+    ObjectRef<GtkWidget> _bar;
+    GtkWidget *_title, *_back, *_search;
+    platform::ui::BarButtonItems _left, _right;
+    std::vector<std::shared_ptr<BarItemPeer>> _peers;
+    std::function<void()> _onBack, _onSearch;
+    SignalConnections _connections;
+};
+
+} // namespace host::gtk
