@@ -34,10 +34,8 @@ void TextView::setFont(const Font& font)
 
 void TextView::setSpacing(TextSpacing spacing)
 {
-    if (spacing == _spacing)
-        return;
-    _spacing = spacing;
-    changed(ViewChange::Content);
+    if (std::exchange(_spacing, spacing) != spacing)
+        changed(ViewChange::Content);
 }
 
 } // namespace platform::ui

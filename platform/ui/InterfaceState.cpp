@@ -1,23 +1,8 @@
-#include "platform/ui/StateCoder.h"
+#include "platform/ui/InterfaceState.h"
 
 #include "platform/ui/ViewController.h"
 
 namespace platform::ui {
-
-StateCoder::StateCoder(PropertyDictionary values)
-    : _values(std::move(values))
-{
-}
-
-void StateCoder::encode(std::string key, PropertyValue value)
-{
-    _values.insert_or_assign(std::move(key), std::move(value));
-}
-
-const PropertyValue* StateCoder::decode(std::string_view key) const
-{
-    return find(_values, key);
-}
 
 PropertyDictionary encodeInterfaceState(ViewController& root)
 {
