@@ -1,0 +1,25 @@
+#pragma once
+
+#include "host/drive/DriveLayout.h"
+#include "platform/Error.h"
+
+namespace host::drive::sample {
+
+/// How a sample drive was made.
+struct Outcome {
+    int written = 0; ///< items that were not there before
+    std::optional<platform::Error> error; ///< why it ended early
+};
+
+/// Fills a drive with a household's documents and signs its owner in: every kind of document that the preview
+/// shows, app libraries, promises, links, references, shared items, tags, names in several scripts. What is
+/// there already stays as it is, so it can be run again.
+Outcome makeSampleDrive(const DriveLayout& layout);
+
+/// The folder of the sample with a thousand items, and how many it has.
+inline constexpr const char* largeFolder = "BrindleDefault/Documents/Household/Receipts";
+inline constexpr int largeFolderCount = 1000;
+/// The folder that may not be read.
+inline constexpr const char* lockedFolder = "BrindleDefault/Documents/Locked drawer";
+
+} // namespace host::drive::sample

@@ -1,0 +1,17 @@
+#pragma once
+
+#include <string>
+
+namespace host::drive::sample {
+
+/// Drawings for the sample drive; each answers the bytes of a file. `variant` chooses colours and shapes.
+std::string landscapeJpeg(int variant);
+std::string portraitPng(int variant); ///< a cat on a cushion
+std::string windowShotPng(); ///< a picture of a screen
+std::string chartSvg();
+std::string sketchSvg(int variant);
+
+/// One frame of a sunrise, as JPEG; `progress` runs from 0 to 1.
+std::string sunriseFrameJpeg(int width, int height, double progress);
+
+} // namespace host::drive::sample

@@ -1,0 +1,189 @@
+#include "host/drive/sample/SampleWriter.h"
+
+#include "host/drive/ItemFacts.h"
+#include "host/drive/SmallFile.h"
+#include "host/system/FileDescriptor.h"
+#include "host/system/PosixFileSystem.h"
+
+#include <fcntl.h>
+#include <glib.h>
+#include <sys/stat.h>
+#include <sys/xattr.h>
+
+#include <cerrno>
+#include <cstdio>
+#include <ctime>
+#include <filesystem>
+#include <memory>
+
+namespace host::drive::sample {
+
+namespace {
+
+using host::system::FileDescriptor;
+
+std::int64_t secondsDaysAgo(int days)
+{
+    // A time of day that differs from item to item, so that lists by date look like a person's.
+    return std::time(nullptr) - days * 86'400LL - (days * 7919) % 40'000;
+}
+
+std::string joined(const std::vector<std::string>& names)
+{
+    std::string text;
+    for (const auto& name : names)
+        text.append(text.empty() ? "" : ",").append(name);
+    return text;
+}
+
+void setMark(const std::string& path, const char* attribute, const std::string& value)
+{
+    // A file system without extended attributes still makes a usable drive.
+    ::lsetxattr(path.c_str(), attribute, value.data(), value.size(), 0);
+}
+
+std::string contentName(const std::string& path)
+{
+    const std::unique_ptr<char, decltype(&g_free)> digest(
+        g_compute_checksum_for_string(G_CHECKSUM_SHA256, path.c_str(), -1), &g_free);
+    return std::string(digest.get()).substr(0, 32);
+}
+
+bool writeAll(const FileDescriptor& file, std::string_view content)
+{
+    while (!content.empty()) {
+        const auto count = ::write(file.get(), content.data(), content.size());
+        if (count < 0 && errno != EINTR)
+            return false;
+        content.remove_prefix(count > 0 ? static_cast<std::size_t>(count) : 0);
+    }
+    return true;
+}
+
+} // namespace
+
+bool SampleWriter::fail(int errorNumber, const std::string& path)
+{
+    if (!_error)
+        _error = itemError(errorNumber, path);
+    return false;
+}
+
+bool SampleWriter::isTaken(const std::string& absolutePath) const
+{
+    return existsOnDisk(absolutePath).value_or(true)
+        || existsOnDisk(PromiseRecord::pathFor(absolutePath)).value_or(true);
+}
+
+bool SampleWriter::makeFolders(const std::string& absolutePath)
+{
+    std::error_code error;
+    std::filesystem::create_directories(absolutePath, error);
+    return error ? fail(error.value(), absolutePath) : !_error;
+}
+
+// Whole or not at all, and never over something else: written under a name of its own, then given its name.
+bool SampleWriter::write(const std::string& absolutePath, std::string_view content)
+{
+    const auto folder = std::filesystem::path(absolutePath).parent_path().string();
+    if (!makeFolders(folder))
+        return false;
+    const auto temporary = folder + "/.tarrow-sample-" + std::to_string(::getpid());
+    {
+        const FileDescriptor file(
+            ::open(temporary.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC, 0600));
+        if (!file || !writeAll(file, content)) {
+            const int failure = errno;
+            ::unlink(temporary.c_str());
+            return fail(failure, absolutePath);
+        }
+    }
+    if (::renameat2(AT_FDCWD, temporary.c_str(), AT_FDCWD, absolutePath.c_str(), RENAME_NOREPLACE) != 0) {
+        const int failure = errno;
+        ::unlink(temporary.c_str());
+        return failure == EEXIST ? false : fail(failure, absolutePath);
+    }
+    ++_written;
+    return true;
+}
+
+void SampleWriter::decorate(const std::string& absolutePath, const Traits& traits)
+{
+    setMark(absolutePath, itemMark::status, "current");
+    if (!traits.tags.empty())
+        setMark(absolutePath, itemMark::tags, joined(traits.tags));
+    if (traits.extensionHidden)
+        setMark(absolutePath, host::system::hiddenExtensionAttribute, "1");
+    if (traits.sharedAs) {
+        setMark(absolutePath, itemMark::shared, "1");
+        setMark(absolutePath, itemMark::role,
+            *traits.sharedAs == platform::SharedItemRole::Owner ? "owner" : "participant");
+    }
+    const timespec changed{secondsDaysAgo(traits.daysAgo), 0};
+    const timespec times[] = {changed, changed};
+    ::utimensat(AT_FDCWD, absolutePath.c_str(), times, AT_SYMLINK_NOFOLLOW);
+}
+
+void SampleWriter::folder(const std::string& path, const Traits& traits)
+{
+    if (isTaken(absolute(path)) || !makeFolders(absolute(path)))
+        return;
+    ++_written;
+    decorate(absolute(path), traits);
+}
+
+void SampleWriter::lockedFolder(const std::string& path)
+{
+    if (isTaken(absolute(path)) || !makeFolders(absolute(path)))
+        return;
+    ++_written;
+    if (::chmod(absolute(path).c_str(), 0) != 0)
+        fail(errno, absolute(path));
+}
+
+void SampleWriter::document(const std::string& path, const Content& content, const Traits& traits)
+{
+    if (_error || isTaken(absolute(path)))
+        return;
+    if (write(absolute(path), content()))
+        decorate(absolute(path), traits);
+}
+
+void SampleWriter::promised(const std::string& path, const Content& content, const Traits& traits)
+{
+    if (_error || isTaken(absolute(path)))
+        return;
+    const auto bytes = content();
+    PromiseRecord promise;
+    promise.size = bytes.size();
+    const platform::Date changed{secondsDaysAgo(traits.daysAgo) * 1'000'000'000};
+    promise.created = promise.modified = changed;
+    promise.shared = traits.sharedAs.has_value();
+    promise.role = traits.sharedAs;
+    promise.tags = traits.tags;
+    promise.extensionHidden = traits.extensionHidden;
+    promise.content = contentName(path);
+    // The content first: a promise must never stand for something that is not there.
+    record(_layout.cloud() + '/' + promise.content, bytes);
+    write(PromiseRecord::pathFor(absolute(path)), promise.toJson());
+}
+
+void SampleWriter::link(const std::string& path, const std::string& target)
+{
+    if (_error || isTaken(absolute(path)))
+        return;
+    if (!makeFolders(std::filesystem::path(absolute(path)).parent_path().string()))
+        return;
+    if (::symlink(target.c_str(), absolute(path).c_str()) == 0)
+        ++_written;
+    else if (errno != EEXIST)
+        fail(errno, absolute(path));
+}
+
+void SampleWriter::record(const std::string& absolutePath, const std::string& content)
+{
+    if (!_error && !existsOnDisk(absolutePath).value_or(true))
+        write(absolutePath, content);
+}
+
+} // namespace host::drive::sample
