@@ -40,6 +40,7 @@ struct LayoutSolver::Impl {
     bool place(Stored& constraint);
     SparseRow markedRow(Stored& constraint);
     std::optional<Column> subject(const SparseRow& row, const Stored& constraint) const;
+    void addCosts(const Stored& constraint, double cost);
     void unplace(Stored& constraint);
     void makeFeasible();
     void makeCostsLeast();
@@ -65,13 +66,18 @@ SparseRow LayoutSolver::Impl::markedRow(Stored& constraint)
     if (!constraint.isRequired()) {
         constraint.other = tableau.addColumn(Kind::Restricted);
         row.add(*constraint.other, -constraint.markerCoefficient);
-        tableau.addCost(*constraint.other, constraint.priority, 1);
-        if (constraint.relation == LayoutRelation::Equal)
-            tableau.addCost(constraint.marker, constraint.priority, 1);
+        addCosts(constraint, 1);
     }
     if (row.constant < 0)
         row.scale(-1);
     return row;
+}
+
+void LayoutSolver::Impl::addCosts(const Stored& constraint, double cost)
+{
+    tableau.addCost(*constraint.other, constraint.priority, cost);
+    if (constraint.relation == LayoutRelation::Equal)
+        tableau.addCost(constraint.marker, constraint.priority, cost);
 }
 
 /// A column that can be basic at once.
@@ -112,6 +118,8 @@ bool LayoutSolver::Impl::place(Stored& constraint)
 
 void LayoutSolver::Impl::unplace(Stored& constraint)
 {
+    if (constraint.other)
+        addCosts(constraint, -1);
     tableau.removeEquation(constraint.marker);
     tableau.freeColumn(constraint.marker);
     if (constraint.other)
