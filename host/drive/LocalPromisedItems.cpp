@@ -48,6 +48,19 @@ Result<AttributeMap> LocalPromisedItems::promisedItemResourceValues(
     return facts.error ? Result<AttributeMap>(*facts.error) : values(url, facts, keys);
 }
 
+platform::ItemReading LocalPromisedItems::readItem(const Url& url, platform::AttributeKeys keys) const
+{
+    const auto& facts = lookAtItem(url.path());
+    if (facts.presence == ItemFacts::Presence::Missing)
+        return {facts.error, {}, url, {}};
+    const bool isPromised = facts.presence == ItemFacts::Presence::Promised;
+    auto physical = isPromised ? Url::fileURL(PromiseRecord::pathFor(url.path())) : url;
+    if (facts.error)
+        return {std::nullopt, *facts.error, std::move(physical), {}};
+    return {std::nullopt, values(url, facts, keys), std::move(physical),
+        isPromised ? facts.promise.tags : facts.marks.tags};
+}
+
 Result<AttributeMap> LocalPromisedItems::resourceValues(const Url& url, platform::AttributeKeys keys) const
 {
     const auto facts = lookAtFile(url.path());

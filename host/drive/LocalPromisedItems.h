@@ -21,6 +21,7 @@ public:
     std::optional<platform::Error> checkPromisedItemIsReachable(const platform::Url& url) const override;
     platform::Result<platform::AttributeMap> promisedItemResourceValues(
         const platform::Url& url, platform::AttributeKeys keys) const override;
+    platform::ItemReading readItem(const platform::Url& url, platform::AttributeKeys keys) const override;
     platform::Result<platform::AttributeMap> resourceValues(
         const platform::Url& url, platform::AttributeKeys keys) const override;
     platform::Url physicalURLForPromise(const platform::Url& url) const override;

@@ -58,6 +58,10 @@ public:
             changePromised(url, values);
         return values;
     }
+    platform::ItemReading readItem(const Url& url, AttributeKeys keys) const override
+    {
+        return unreachable || changePromised ? PromisedItems::readItem(url, keys) : _real.readItem(url, keys);
+    }
     Result<AttributeMap> resourceValues(const Url& url, AttributeKeys keys) const override
     {
         auto values = _real.resourceValues(url, keys);
