@@ -135,8 +135,9 @@ void DocumentListController::contentsDidChange(const FolderContentsUpdate& updat
     _state = update.stage;
     _failure = update.error;
     _rows->setRows(update.rows);
+    _rows->invalidateDetails();
     _listView->apply(update.changes);
-    _rows->refreshDetails();
+    _rows->visibleRowsDidChange();
     if (update.stage != ListingStage::FirstRows)
         _listView->endRefreshing();
     if (_search)

@@ -128,12 +128,11 @@ void DocumentRowSource::visibleRowsDidChange()
     forgetDetailsOutside(range);
 }
 
-void DocumentRowSource::refreshDetails()
+void DocumentRowSource::invalidateDetails()
 {
     for (auto& [id, known] : _known)
         known.isStale = true;
     _loader->cancelAll();
-    visibleRowsDidChange();
 }
 
 void DocumentRowSource::detailsArrived(ui::RowId id, RowDetails details)

@@ -38,8 +38,9 @@ public:
 
     /// Fetches what is missing for the visible rows.
     void visibleRowsDidChange();
-    /// The items may have changed: known details stay on the screen until they have been read again.
-    void refreshDetails();
+    /// The items may have changed: known details stay on the screen until the next `visibleRowsDidChange` has
+    /// read them again.
+    void invalidateDetails();
 
     std::size_t numberOfRows(const ui::ListView& list) const override;
     ui::ListRow rowAtIndex(const ui::ListView& list, std::size_t index) const override;

@@ -6,6 +6,8 @@
 #include "platform/ui/StackView.h"
 #include "platform/ui/StandardColors.h"
 
+#include <initializer_list>
+
 namespace platform::components {
 
 namespace {
@@ -47,8 +49,10 @@ void PlaceholderView::build()
     _title = makeLabel(ui::Font::preferred(ui::TextStyle::Title2).bold());
     _message = makeLabel(ui::Font::preferred(ui::TextStyle::Body));
     _message->setTextColor(ui::StandardColors::gray);
-    _stack = std::make_shared<ui::StackView>(
-        std::vector<std::shared_ptr<ui::View>>{_spinner, _icon, _title, _message}, ui::Axis::Vertical);
+    _stack = std::make_shared<ui::StackView>(ui::Axis::Vertical);
+    for (const auto& part :
+        std::initializer_list<std::shared_ptr<ui::View>>{_spinner, _icon, _title, _message})
+        _stack->addArrangedSubview(part);
     _stack->setStackAlignment(ui::StackAlignment::Center);
     _stack->setSpacing(lineSpacing);
     _stack->setPlacedByFrame(false);

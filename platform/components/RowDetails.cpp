@@ -58,23 +58,8 @@ void appendPart(std::string& text, const std::string& part)
     text += part;
 }
 
-AttributeMap attributes(const Url& url)
+void describe(RowDetails& details, const Url& url, FolderEntryKind kind, const AttributeMap& values)
 {
-    AttributeMap values;
-    services().fileCoordinator().coordinateReading(
-        url, ReadingOptions::ImmediatelyAvailableMetadataOnly, [&values](const Url& location) {
-            if (auto read = promisedItems().promisedItemResourceValues(location, detailKeys))
-                values = std::move(*read.value);
-        });
-    return values;
-}
-
-} // namespace
-
-RowDetails readRowDetails(const Url& url, FolderEntryKind kind)
-{
-    RowDetails details;
-    const auto values = attributes(url);
     details.name = values.optional<std::string>(AttributeKey::LocalizedName);
     if (const auto* date = values.get<Date>(AttributeKey::ContentModificationDate))
         details.text = services().formatters().date(*date, DateStyle::Medium, DateStyle::None);
@@ -84,8 +69,20 @@ RowDetails readRowDetails(const Url& url, FolderEntryKind kind)
     const auto* status = values.get<DownloadingStatus>(AttributeKey::DownloadingStatus);
     if (status && *status == DownloadingStatus::NotDownloaded)
         details.download = ui::DownloadState::InCloud;
-    if (auto names = promisedItems().tagNames(url))
-        details.tagNames = std::move(*names.value);
+}
+
+} // namespace
+
+RowDetails readRowDetails(const Url& url, FolderEntryKind kind)
+{
+    RowDetails details;
+    services().fileCoordinator().coordinateReading(
+        url, ReadingOptions::ImmediatelyAvailableMetadataOnly, [&](const Url& location) {
+            if (const auto values = promisedItems().promisedItemResourceValues(location, detailKeys))
+                describe(details, location, kind, *values);
+            if (auto names = promisedItems().tagNames(location))
+                details.tagNames = std::move(*names.value);
+        });
     return details;
 }
 

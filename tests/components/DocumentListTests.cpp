@@ -1,0 +1,387 @@
+#include "tests/components/support/ComponentsFixture.h"
+
+#include "host/drive/ContainerRecord.h"
+#include "host/drive/ItemFacts.h"
+#include "platform/components/DocumentSearch.h"
+#include "platform/components/PlaceholderView.h"
+#include "platform/components/UnavailableScreen.h"
+#include "platform/ui/ListView.h"
+#include "platform/ui/ListViewObserver.h"
+#include "platform/ui/NavigationItem.h"
+#include "platform/ui/SearchPresentation.h"
+
+#include <gmock/gmock.h>
+
+#include <cerrno>
+#include <filesystem>
+
+using namespace platform;
+using namespace platform::components;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing_support::ComponentsFixture;
+using testing_support::HandLister;
+namespace mark = host::drive::itemMark;
+
+namespace {
+
+using Kind = FolderEntryKind;
+using Lines = std::vector<std::string>;
+
+class DocumentList : public ComponentsFixture { };
+
+/// Writes down the exact changes that a list's peer is told.
+struct RecordingListObserver : ui::ListViewObserver {
+    void rowsWereReset(ui::ListView&) override { ++resets; }
+    void rowsDidChange(ui::ListView&, const ui::ListChanges& changes) override { last = changes; }
+    void rowDidChange(ui::ListView&, std::size_t index) override { changedRows.push_back(index); }
+    void selectionDidChange(ui::ListView&) override { }
+    void scrollToRow(ui::ListView&, std::size_t, ui::RowPosition, bool) override { }
+    void refreshStateDidChange(ui::ListView&) override { }
+
+    int resets = 0;
+    ui::ListChanges last;
+    std::vector<std::size_t> changedRows;
+};
+
+HandLister::Entries documents(std::size_t count)
+{
+    HandLister::Entries entries;
+    for (std::size_t i = 0; i < count; ++i)
+        entries.push_back({"item " + std::to_string(100'000 + i) + ".txt"});
+    return entries;
+}
+
+Url makePaintLibrary(const testing_support::DriveFixture& drive)
+{
+    host::drive::ContainerRecord record;
+    record.names = {{"en", "Paint"}};
+    record.iconName = "paint-icon";
+    return drive.makeContainer("com.example.paint", record);
+}
+
+struct RowOfKind {
+    HandLister::Entry entry;
+    const char* detail; ///< the end of the second line
+    ui::DownloadState download = ui::DownloadState::Present;
+    ui::RowAccessory accessory = ui::RowAccessory::None;
+    std::size_t dots = 0;
+};
+
+TEST_F(DocumentList, ShowsEveryKindOfItemWithItsDetails)
+{
+    drive.writeDocument("Stuff/Notes.txt", std::string(1500, 'x'));
+    drive.writeDocument("Stuff/Trip/one.txt");
+    drive.writeDocument("Stuff/Trip/.hidden");
+    drive.writePromise("Stuff/Trip/two.txt", {});
+    host::drive::PromiseRecord farAway;
+    farAway.size = 2'000'000;
+    farAway.tags = {"Red", "Work"};
+    drive.writePromise("Stuff/Far.pdf", farAway);
+    drive.mark(drive.writeDocument("Stuff/Ours.txt", "abc"), mark::shared, "1");
+    drive.writeLink("Stuff/Pointer", "Notes.txt");
+    drive.makeFolder("Stuff/Letter.pages");
+    drive.writeDocument("Stuff/bad\xFFname");
+    const RowOfKind rows[] = {
+        {{"Trip", Kind::Folder}, "2 items", ui::DownloadState::Present, ui::RowAccessory::Disclosure},
+        {{"bad\xFFname"}, "7 bytes"},
+        {{"Far.pdf", Kind::Document, true}, "2 MB", ui::DownloadState::InCloud, ui::RowAccessory::None, 2},
+        {{"Letter.pages", Kind::Package}, ""},
+        {{"Notes.txt"}, "2 KB"},
+        {{"Ours.txt"}, "3 bytes · Shared"},
+        {{"Pointer", Kind::Link}, "Link"},
+    };
+    HandLister::Entries entries;
+    for (const auto& row : rows)
+        entries.push_back(row.entry);
+    const auto list = shownList(drive.url("Stuff"));
+    deliver(list, entries);
+
+    ASSERT_EQ(list->listView()->rowCount(), std::size(rows));
+    for (std::size_t i = 0; i < std::size(rows); ++i) {
+        SCOPED_TRACE(rows[i].entry.name);
+        const auto shown = list->listView()->row(i);
+        EXPECT_THAT(shown.detail, testing::EndsWith(rows[i].detail));
+        EXPECT_EQ(shown.download, rows[i].download);
+        EXPECT_EQ(shown.accessory, rows[i].accessory);
+        EXPECT_EQ(shown.tagColors.size(), rows[i].dots);
+        EXPECT_TRUE(shown.image.has_value());
+        EXPECT_TRUE(isValidUtf8(shown.title));
+    }
+    EXPECT_EQ(list->listView()->row(1).title, "bad\xEF\xBF\xBDname");
+    EXPECT_THAT(list->listView()->row(2).accessibleDescription,
+        testing::AllOf(HasSubstr("Far.pdf"), HasSubstr("In the cloud"), HasSubstr("Work")));
+}
+
+TEST_F(DocumentList, ShowsTheLibrariesAtTheTopOfTheDrive)
+{
+    makePaintLibrary(drive);
+    const auto root = DocumentListController::createRootList();
+    ASSERT_TRUE(root);
+    const auto list = shownList(*root->presentedURL());
+    deliver(list, {{"Documents", Kind::Folder}});
+    EXPECT_EQ(titles(list), (Lines{"Paint", "Documents"}));
+    EXPECT_EQ(list->listView()->row(0).image, Image::named("paint-icon"));
+    EXPECT_EQ(list->containedItems().back(), drive.url("Documents"));
+
+    delegate->take();
+    list->listView()->activateRow(0);
+    EXPECT_EQ(delegate->take(), (Lines{"folder Paint Documents"}));
+
+    drive.signOut();
+    drive.settle();
+    EXPECT_FALSE(DocumentListController::createRootList());
+}
+
+TEST_F(DocumentList, ReportsWhatIsTapped)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    deliver(
+        list, {{"Trip", Kind::Folder}, {"Notes.txt"}, {"Letter.pages", Kind::Package}, {"To", Kind::Link}});
+    EXPECT_EQ(delegate->take(), (Lines{"changed 4 selected 0"}));
+    for (std::size_t row = 0; row < 5; ++row)
+        list->listView()->activateRow(row);
+    EXPECT_EQ(
+        delegate->take(), (Lines{"folder Trip Trip", "item Notes.txt", "item Letter.pages", "item To"}));
+}
+
+TEST_F(DocumentList, OffersTheEnabledActionsWithTheirCodes)
+{
+    makePaintLibrary(drive);
+    const auto list = shownList(*DocumentListController::createRootList()->presentedURL());
+    deliver(list, {{"Notes.txt"}});
+    delegate->take();
+    EXPECT_TRUE(list->listView()->menuForRow(1).empty());
+
+    list->setAvailableActions(125);
+    for (const auto& entry : list->listView()->menuForRow(1))
+        entry.handler();
+    list->listView()->openPeek(1);
+    EXPECT_EQ(delegate->take(),
+        (Lines{"action 2 Notes.txt", "action 4 Notes.txt", "action 3 Notes.txt", "action 5 Notes.txt",
+            "action 0 Notes.txt", "action 6 Notes.txt"}));
+
+    Lines titlesOfLibrary;
+    for (const auto& entry : list->listView()->menuForRow(0))
+        titlesOfLibrary.push_back(entry.title);
+    EXPECT_EQ(titlesOfLibrary, (Lines{"Info", "Share", "Delete"}));
+}
+
+TEST_F(DocumentList, SelectsWhileEditingAndKeepsTheSelectionThroughChanges)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    list->setAvailableActions(125);
+    deliver(list, {{"a"}, {"b"}, {"c"}, {"d"}});
+    list->setSelectedItems({drive.url("Stuff/a")});
+    EXPECT_TRUE(list->selectedItems().empty());
+
+    list->setEditingAnimated(true, true);
+    delegate->take();
+    list->listView()->activateRow(3);
+    list->listView()->activateRow(1);
+    EXPECT_EQ(delegate->take(), (Lines{"changed 4 selected 1", "changed 4 selected 2"}));
+    EXPECT_TRUE(list->listView()->menuForRow(0).empty());
+
+    const auto observer = std::make_shared<RecordingListObserver>();
+    list->listView()->setListObserver(observer);
+    deliver(list, {{"0"}, {"a"}, {"b"}, {"d"}});
+    EXPECT_EQ(list->selectedItems(), (std::vector{drive.url("Stuff/b"), drive.url("Stuff/d")}));
+    EXPECT_EQ(observer->last.splices, (std::vector<ui::ListSplice>{{0, 0, 1}, {3, 1, 0}}));
+    EXPECT_EQ(observer->resets, 0);
+    EXPECT_EQ(list->listView()->row(2).check, ui::CheckState::On);
+
+    deliver(list, {{"a"}, {"b"}});
+    EXPECT_EQ(list->selectedItems(), std::vector{drive.url("Stuff/b")});
+    list->setSelectedItems({drive.url("Stuff/a"), drive.url("Stuff/gone"), drive.url("Elsewhere/b")});
+    EXPECT_EQ(list->selectedItems(), std::vector{drive.url("Stuff/a")});
+    list->setEditingAnimated(false, true);
+    EXPECT_EQ(list->selectedItemCount(), 0U);
+}
+
+TEST_F(DocumentList, ReadsDetailsOfVisibleRowsOnly)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    const auto all = documents(10'000);
+    lister->deliver(*list->presentedURL(), {all.begin(), all.begin() + 100}, ListingStage::FirstRows);
+    EXPECT_EQ(list->containedItemCount(), 100U);
+    deliver(list, all);
+    EXPECT_EQ(list->containedItemCount(), 10'000U);
+    const auto visible = list->listView()->visibleRows();
+    EXPECT_LT(visible.count, 20U);
+    // The first rows were wanted twice: when they came, and when the list was complete.
+    EXPECT_LE(coordinator->takeReads().size(), 2 * visible.count);
+
+    list->listView()->userScrolled({0, 5000 * list->listView()->rowHeight()});
+    list->listView()->userScrolled({0, 9000 * list->listView()->rowHeight()});
+    drive.dispatch->runUntilIdle();
+    const auto read = coordinator->takeReads();
+    ASSERT_FALSE(read.empty());
+    EXPECT_LT(read.size(), 20U);
+    for (const auto& name : read)
+        EXPECT_GE(name, "item 109000.txt");
+}
+
+TEST_F(DocumentList, ShowsChangedDetailsWithoutTouchingOtherRows)
+{
+    drive.writeDocument("Stuff/a.txt", "1");
+    drive.writeDocument("Stuff/b.txt", "1");
+    const auto list = shownList(drive.url("Stuff"));
+    deliver(list, {{"a.txt"}, {"b.txt"}});
+    const auto observer = std::make_shared<RecordingListObserver>();
+    list->listView()->setListObserver(observer);
+
+    drive.writeDocument("Stuff/b.txt", "12345");
+    lister->deliver(*list->presentedURL(), {{"a.txt"}, {"b.txt"}});
+    EXPECT_THAT(list->listView()->row(1).detail, HasSubstr("1 byte"));
+    drive.dispatch->runUntilIdle();
+    EXPECT_THAT(list->listView()->row(1).detail, HasSubstr("5 bytes"));
+    EXPECT_THAT(observer->changedRows, ElementsAre(1U));
+}
+
+TEST_F(DocumentList, TakesTheNewestOfManyStates)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    // Each is large enough to be compared in the background, and comes before the one before is done.
+    for (const auto count : {3000U, 5000U, 4000U})
+        lister->deliver(*list->presentedURL(), documents(count));
+    EXPECT_EQ(list->containedItemCount(), 0U);
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(list->containedItemCount(), 4000U);
+    EXPECT_EQ(list->listView()->rowCount(), 4000U);
+    EXPECT_EQ(delegate->take(), (Lines{"changed 3000 selected 0", "changed 4000 selected 0"}));
+}
+
+TEST_F(DocumentList, SaysThatAFolderIsLoadingEmptyOrUnreadable)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    const auto& placeholder = *list->placeholder();
+    EXPECT_TRUE(placeholder.isHidden());
+    drive.dispatch->advance(1);
+    EXPECT_FALSE(placeholder.isHidden());
+    EXPECT_TRUE(placeholder.content().isBusy);
+
+    deliver(list, {});
+    EXPECT_FALSE(placeholder.isHidden());
+    EXPECT_EQ(placeholder.content().title, "Folder is empty");
+    deliver(list, {{"a"}});
+    EXPECT_TRUE(placeholder.isHidden());
+
+    lister->fail(*list->presentedURL(), Error(errorDomain::system, EACCES));
+    EXPECT_FALSE(placeholder.isHidden());
+    EXPECT_EQ(placeholder.content().title, "This folder cannot be shown");
+    EXPECT_THAT(placeholder.content().message, HasSubstr("permission"));
+
+    const auto quick = shownList(drive.makeFolder("Quick"));
+    deliver(quick, {{"a"}});
+    drive.dispatch->advance(1);
+    EXPECT_TRUE(quick->placeholder()->isHidden());
+}
+
+TEST_F(DocumentList, ReportsARemovedFolderOnceAndOnlyWhileItIsShown)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    deliver(list, {{"a"}});
+    list->beginAppearance(false, false);
+    list->endAppearance();
+    delegate->take();
+    lister->fail(*list->presentedURL(), Error(FileErrorCode::NoSuchItem));
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(delegate->take(), (Lines{"changed 0 selected 0"}));
+
+    list->beginAppearance(true, false);
+    list->endAppearance();
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(delegate->take(), (Lines{"removed Stuff"}));
+    lister->fail(*list->presentedURL(), Error(FileErrorCode::NoSuchItem));
+    EXPECT_EQ(delegate->take(), (Lines{"changed 0 selected 0"}));
+}
+
+TEST_F(DocumentList, ListsAnewWhenItIsPulled)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    deliver(list, {{"a"}});
+    list->listView()->pulledToRefresh();
+    EXPECT_TRUE(list->listView()->isRefreshing());
+    EXPECT_EQ(lister->listingsStarted(), 2U);
+    deliver(list, {{"a"}, {"b"}});
+    EXPECT_FALSE(list->listView()->isRefreshing());
+    EXPECT_EQ(titles(list), (Lines{"a", "b"}));
+}
+
+TEST_F(DocumentList, KnowsTheWayFromTheTopOfTheDrive)
+{
+    const auto library = makePaintLibrary(drive);
+    const struct {
+        Url url;
+        Lines names;
+    } rows[] = {
+        {drive.url("Documents/Trip"), {"Tarrow Drive", "Documents", "Trip"}},
+        {library, {"Tarrow Drive", "Paint"}},
+        {library.appendingPathComponent("Sketches"), {"Tarrow Drive", "Paint", "Sketches"}},
+        {Url::fileURL("/tmp"), {}},
+        {Url::fileURL(drive.layout().trash()), {}},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.url.path());
+        Lines names;
+        for (const auto& list : DocumentListController::hierarchyForURL(row.url))
+            names.push_back(list->title());
+        if (!names.empty())
+            names.front() = "Tarrow Drive";
+        EXPECT_EQ(names, row.names);
+    }
+}
+
+TEST_F(DocumentList, SearchesTheNamesOfItsItems)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    deliver(list, {{"Trip", Kind::Folder}, {"Notes.txt"}, {"My trip.txt"}});
+    delegate->take();
+    list->startSearchWithQueryStringBecomeFirstResponder("trip", true);
+    drive.dispatch->runUntilIdle();
+    const auto search = std::dynamic_pointer_cast<ui::SearchPresentation>(list->presentedViewController());
+    ASSERT_TRUE(search);
+    EXPECT_TRUE(search->hasFocus());
+    const auto results = std::dynamic_pointer_cast<ui::ListView>(search->view()->subviews().front());
+    ASSERT_TRUE(results);
+    EXPECT_EQ(results->rowCount(), 2U);
+
+    deliver(list, {{"Trip", Kind::Folder}, {"Notes.txt"}});
+    EXPECT_EQ(results->rowCount(), 1U);
+    results->activateRow(0);
+    EXPECT_EQ(delegate->take(), (Lines{"changed 2 selected 0", "folder Trip Trip"}));
+    search->userEditedQuery("");
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(results->rowCount(), 0U);
+}
+
+struct ListWithoutSearch : DocumentListController {
+    using DocumentListController::DocumentListController;
+    bool shouldShowSearch() const override { return false; }
+};
+
+TEST_F(DocumentList, OffersASearchFieldUnlessItShouldNot)
+{
+    const auto plain = shownList(drive.makeFolder("Stuff"));
+    EXPECT_TRUE(plain->navigationItem().searchAction());
+    const auto without = std::make_shared<ListWithoutSearch>(std::nullopt);
+    without->view();
+    EXPECT_FALSE(without->navigationItem().searchAction());
+    EXPECT_TRUE(without->containedItems().empty());
+}
+
+TEST_F(DocumentList, TellsWhoIsNotSignedInWhatToDo)
+{
+    for (const double width : {360.0, 1024.0}) {
+        const auto view = UnavailableScreen::create()->view();
+        view->setFrame({0, 0, width, 640});
+        view->layoutIfNeeded();
+        const auto& text = view->subviews().front()->frame();
+        EXPECT_GE(text.x, 20);
+        EXPECT_LE(text.maxX(), width - 20);
+        EXPECT_LE(text.width, PlaceholderView::maximumWidth);
+        EXPECT_NEAR(text.midX(), width / 2, 1);
+    }
+}
+
+} // namespace

@@ -1,0 +1,87 @@
+#pragma once
+
+#include "platform/FileCoordinator.h"
+#include "platform/LinkOpener.h"
+#include "platform/Services.h"
+#include "platform/components/DocumentListController.h"
+#include "platform/components/DocumentListControllerDelegate.h"
+#include "tests/components/support/HandLister.h"
+#include "tests/support/DriveFixture.h"
+
+#include <gtest/gtest.h>
+
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace testing_support {
+
+/// Counts the reads of the coordinator that it stands before.
+class CountingCoordinator : public platform::FileCoordinator {
+public:
+    explicit CountingCoordinator(platform::FileCoordinator& real)
+        : _real(real)
+    {
+    }
+    std::optional<platform::Error> coordinateReading(
+        const platform::Url& url, platform::ReadingOptions options, const Accessor& accessor) override;
+    std::vector<std::string> takeReads();
+
+private:
+    platform::FileCoordinator& _real;
+    std::vector<std::string> _names;
+};
+
+class RecordingLinks : public platform::LinkOpener {
+public:
+    void openLink(const std::string& url, Completion completion) override
+    {
+        opened.push_back(url);
+        completion(answer);
+    }
+    std::vector<std::string> opened;
+    std::optional<platform::Error> answer;
+};
+
+/// Writes down what a folder list reports, one line each.
+class RecordingListDelegate : public platform::components::DocumentListControllerDelegate {
+public:
+    void documentListControllerDidSelectContainerWithViewController(
+        const List& list, const List& container) override;
+    void documentListControllerDidSelectItemAtURL(const List& list, const platform::Url& url) override;
+    void documentListControllerItemsChanged(const List& list) override;
+    void documentListControllerURLWasRemoved(const List& list) override;
+    void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,
+        const platform::Url& url, const std::shared_ptr<platform::ui::View>& view,
+        const Completion& completion) override;
+
+    std::vector<std::string> take();
+
+private:
+    std::vector<std::string> _lines;
+};
+
+/// The platform's screens on a real drive in a temporary folder; the listings alone come from the test.
+class ComponentsFixture : public testing::Test {
+protected:
+    using List = std::shared_ptr<platform::components::DocumentListController>;
+
+    ComponentsFixture();
+
+    /// A list of a folder with a size for about ten rows, loaded, shown and watched by `delegate`.
+    List shownList(const platform::Url& folder);
+    void deliver(const List& list, const HandLister::Entries& entries,
+        platform::ListingStage stage = platform::ListingStage::Complete);
+    std::vector<std::string> titles(const List& list) const;
+
+    DriveFixture drive;
+    std::shared_ptr<HandLister> lister = std::make_shared<HandLister>();
+    std::shared_ptr<RecordingLinks> links = std::make_shared<RecordingLinks>();
+    std::shared_ptr<CountingCoordinator> coordinator;
+    std::shared_ptr<RecordingListDelegate> delegate = std::make_shared<RecordingListDelegate>();
+
+private:
+    platform::Services _driveServices = platform::services();
+};
+
+} // namespace testing_support

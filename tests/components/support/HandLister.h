@@ -1,0 +1,40 @@
+#pragma once
+
+#include "platform/FolderLister.h"
+
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace testing_support {
+
+/// A lister whose listings the test delivers by hand, so that it decides what arrives, in which order and
+/// when. Like the real one it calls back on the main queue only, here from within `deliver`.
+class HandLister : public platform::FolderLister {
+public:
+    struct Entry {
+        std::string name;
+        platform::FolderEntryKind kind = platform::FolderEntryKind::Document;
+        bool isPromise = false;
+    };
+    using Entries = std::vector<Entry>;
+
+    std::shared_ptr<platform::FolderListing> list(const platform::Url& folder,
+        std::vector<platform::FolderSnapshot::ExtraItem> extraItems, Update update) override;
+
+    /// To the latest listing of a folder, with its extra items first; nothing happens when that has ended.
+    void deliver(const platform::Url& folder, const Entries& entries,
+        platform::ListingStage stage = platform::ListingStage::Complete) const;
+    void fail(const platform::Url& folder, const platform::Error& error) const;
+
+    std::size_t listingsStarted() const { return _listings.size(); }
+
+private:
+    struct Listing;
+    void send(const platform::Url& folder, const Entries& entries, platform::ListingStage stage,
+        std::optional<platform::Error> error) const;
+
+    std::vector<std::weak_ptr<Listing>> _listings;
+};
+
+} // namespace testing_support
