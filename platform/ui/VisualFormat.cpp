@@ -24,6 +24,13 @@ struct Predicate {
 
 using Predicates = std::vector<Predicate>;
 
+Predicates exactly(double constant)
+{
+    Predicate predicate;
+    predicate.constant = constant;
+    return {predicate};
+}
+
 /// A view of the format, or the superview at its edge.
 struct Item {
     std::shared_ptr<View> view;
@@ -135,7 +142,7 @@ private:
             return std::nullopt;
         if (peek() == '[' || peek() == '|')
             return Predicates{};
-        auto predicates = peek() == '(' ? parsePredicates() : Predicates{{{}, parseNumber(), nullptr}};
+        auto predicates = peek() == '(' ? parsePredicates() : exactly(parseNumber());
         expect("-");
         return predicates;
     }
@@ -235,9 +242,9 @@ private:
             return fail("the view at the edge has no superview");
         const auto near = before.isSuperview ? superview->anchor(start()) : before.view->anchor(end());
         const auto far = after.isSuperview ? superview->anchor(end()) : after.view->anchor(start());
-        auto predicates = connection.value_or(Predicates{{{}, 0, nullptr}});
+        auto predicates = connection.value_or(exactly(0));
         if (predicates.empty())
-            predicates = {{{}, atEdge ? standardMargin : standardSpacing, nullptr}};
+            predicates = exactly(atEdge ? standardMargin : standardSpacing);
         for (const auto& predicate : predicates) {
             if (predicate.view)
                 return fail("a distance is no view");
