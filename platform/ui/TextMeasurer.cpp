@@ -85,12 +85,13 @@ private:
 
     static void addText(LineFiller& filler, std::string_view text, double characterWidth)
     {
+        double space = 0;
         while (true) {
             const auto end = std::min(text.find_first_of(" \n"), text.size());
-            filler.addWord(
-                static_cast<double>(characterCount(text.substr(0, end))) * characterWidth, characterWidth);
+            filler.addWord(static_cast<double>(characterCount(text.substr(0, end))) * characterWidth, space);
             if (end == text.size())
                 return;
+            space = text[end] == '\n' ? 0 : characterWidth;
             if (text[end] == '\n')
                 filler.breakLine();
             text.remove_prefix(end + 1);
