@@ -99,8 +99,11 @@ std::string ContainerRecord::toJson() const
 std::string ContainerRecord::nameIn(const std::vector<std::string>& languages) const
 {
     for (const auto& language : languages) {
-        if (const auto found = names.find(language); found != names.end())
-            return found->second;
+        // "de_AT" is served by "de", but not the other way round.
+        for (const auto& known : {language, language.substr(0, language.find('_'))}) {
+            if (const auto found = names.find(known); found != names.end())
+                return found->second;
+        }
     }
     if (const auto english = names.find("en"); english != names.end())
         return english->second;

@@ -2,6 +2,7 @@
 
 #include "host/drive/SmallFile.h"
 #include "host/system/DirectoryReader.h"
+#include "host/system/UserLocale.h"
 #include "platform/Log.h"
 
 #include <fcntl.h>
@@ -33,8 +34,12 @@ bool isIdentifier(std::string_view name)
 std::vector<std::string> userLanguages()
 {
     std::vector<std::string> languages;
-    for (const char* const* name = g_get_language_names(); *name; ++name)
-        languages.emplace_back(*name);
+    const auto list = host::system::UserLocale::fromEnvironment().languages;
+    for (std::size_t begin = 0; begin <= list.size();) {
+        const auto end = std::min(list.find(':', begin), list.size());
+        languages.push_back(list.substr(begin, end - begin));
+        begin = end + 1;
+    }
     return languages;
 }
 

@@ -3,16 +3,21 @@
 #include "host/drive/AccountRecord.h"
 #include "host/drive/ItemFacts.h"
 #include "host/drive/LinkRecords.h"
+#include "host/system/GdkPixbufImageLoader.h"
+#include "host/system/GettextLocalization.h"
+#include "host/system/IcuFormatters.h"
 #include "host/system/JsonKeyedArchiver.h"
 #include "host/system/JsonUserDefaults.h"
 #include "host/system/LocalFileCoordinator.h"
+#include "host/system/MimeTypeRegistry.h"
 #include "host/system/PosixFileSystem.h"
-#include "platform/TypeRegistry.h"
+#include "host/system/TypePreviewSupport.h"
+#include "host/system/UnicodeCharacterData.h"
+#include "host/system/UserLocale.h"
 
 #include <glib.h>
 #include <sys/xattr.h>
 
-#include <algorithm>
 #include <filesystem>
 #include <fstream>
 #include <stdexcept>
@@ -33,43 +38,19 @@ void writeFile(const std::string& path, std::string_view content)
         throw std::runtime_error("cannot write " + path);
 }
 
-/// Types of the extensions that tests use.
-class ExtensionTypes : public platform::TypeRegistry {
-public:
-    std::optional<std::string> typeForExtension(std::string_view extension) const override
-    {
-        const auto* row = find(&Row::extension, extension);
-        return row ? std::optional(std::string(row->type)) : std::nullopt;
-    }
-    bool conformsTo(std::string_view type, std::string_view other) const override
-    {
-        const auto* row = find(&Row::type, type);
-        return type == other || (row && row->kindOf == other);
-    }
-    std::optional<std::string> description(std::string_view type) const override
-    {
-        const auto* row = find(&Row::type, type);
-        return row ? std::optional(std::string(row->description)) : std::nullopt;
-    }
-    std::string iconName(std::string_view) const override { return "text-x-generic"; }
+const std::shared_ptr<host::system::MimeTypeRegistry>& types()
+{
+    // One for the process: it reads the system's type database and answers from memory.
+    static const auto registry = std::make_shared<host::system::MimeTypeRegistry>();
+    return registry;
+}
 
-private:
-    struct Row {
-        std::string_view extension, type, kindOf, description;
-    };
-    static const Row* find(std::string_view Row::*column, std::string_view value)
-    {
-        static constexpr Row rows[] = {
-            {"txt", "public.plain-text", "public.text", "Plain text document"},
-            {"png", "public.png", "public.image", "PNG image"},
-            {"jpg", "public.jpeg", "public.image", "JPEG image"},
-            {"pdf", "public.pdf", "public.data", "PDF document"},
-            {"pages", "app.tarrow.pages", "public.package", "Pages document"},
-        };
-        const auto* row = std::ranges::find(rows, value, column);
-        return row == std::end(rows) ? nullptr : row;
-    }
-};
+const std::shared_ptr<host::system::GettextLocalization>& englishTexts()
+{
+    static const auto texts = std::make_shared<host::system::GettextLocalization>(
+        "/nonexistent", host::system::UserLocale{"en", "en_US"});
+    return texts;
+}
 
 } // namespace
 
@@ -86,7 +67,12 @@ DriveFixture::DriveFixture()
     set.notificationCenter = notifications;
     set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>();
     set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
-    set.typeRegistry = std::make_shared<ExtensionTypes>();
+    set.characterData = std::make_shared<host::system::UnicodeCharacterData>();
+    set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
+    set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
+    set.localization = englishTexts();
+    set.typeRegistry = types();
+    set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(set.typeRegistry);
     set.keyedArchiver = std::make_shared<host::system::JsonKeyedArchiver>();
     set.userDefaults = std::make_shared<host::system::JsonUserDefaults>(layout.defaults(), *dispatch);
     host::drive::DriveDependencies dependencies{
