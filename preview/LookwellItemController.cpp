@@ -42,13 +42,6 @@ void LookwellItemController::lookwellNewItem(const std::shared_ptr<PreviewItemMa
     reloadData();
 }
 
-void LookwellItemController::viewWillDisappear(bool animated)
-{
-    if (const auto manager = itemManager())
-        manager->viewControllerWillDisappear(shared_from_this());
-    PreviewController::viewWillDisappear(animated);
-}
-
 bool LookwellItemController::_lwPreviewItemIsPDFKind(const Url& item) const
 {
     const auto& types = platform::services().typeRegistry();

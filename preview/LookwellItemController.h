@@ -30,8 +30,6 @@ public:
     /// Makes a manager the current one and shows its item.
     void lookwellNewItem(const std::shared_ptr<PreviewItemManager>& manager);
 
-    void viewWillDisappear(bool animated) override;
-
     /// Whether a location's name says that it is a PDF document.
     bool _lwPreviewItemIsPDFKind(const platform::Url& item) const;
 

@@ -56,8 +56,6 @@ public:
     /// lies over the stack is dismissed first.
     void replaceLastViewController(const std::shared_ptr<platform::ui::ViewController>& screen);
     bool isPreviewControllerDisplayed(const std::shared_ptr<platform::ui::ViewController>& screen) const;
-    /// A preview screen disappears.
-    void viewControllerWillDisappear(const std::shared_ptr<platform::ui::ViewController>& screen);
 
     using ListStack = std::vector<std::shared_ptr<platform::components::DocumentListController>>;
     /// The lists from the drive's top level to the folder of a URL; nothing when it leads to no folder of the
