@@ -2,26 +2,31 @@
 
 #include "platform/CloudDocumentService.h"
 
+#include <memory>
 #include <optional>
-#include <stdexcept>
-#include <vector>
 
 namespace testing_support {
 
-/// An account whose token and quota answers the test chooses. It has no documents.
+/// An account whose token and quota answers the test chooses, over the documents of another service. Without such a
+/// service only the account may be asked for.
 class SimulatedCloud : public platform::CloudDocumentService, public platform::CloudAccount {
 public:
+    explicit SimulatedCloud(std::shared_ptr<platform::CloudDocumentService> documents = nullptr)
+        : _documents(std::move(documents))
+    {
+    }
+
     std::optional<platform::PropertyValue> token = platform::PropertyValue("account-1");
     platform::Result<std::int64_t> quota = std::int64_t{1000};
     mutable int requests = 0;
 
     platform::CloudAccount& account() override { return *this; }
-    platform::PromisedItems& promisedItems() override { throw std::logic_error("no items here"); }
-    platform::DocumentContainers& containers() override { throw std::logic_error("no containers here"); }
-    platform::CloudItems& items() override { throw std::logic_error("no items here"); }
+    platform::PromisedItems& promisedItems() override { return _documents->promisedItems(); }
+    platform::DocumentContainers& containers() override { return _documents->containers(); }
+    platform::CloudItems& items() override { return _documents->items(); }
     platform::SecurityScopedAccess& securityScopedAccess() override
     {
-        throw std::logic_error("nothing here");
+        return _documents->securityScopedAccess();
     }
 
     std::optional<platform::PropertyValue> identityToken() const override { return token; }
@@ -33,6 +38,9 @@ public:
             completion(quota);
         };
     }
+
+private:
+    std::shared_ptr<platform::CloudDocumentService> _documents;
 };
 
 } // namespace testing_support

@@ -1,0 +1,304 @@
+#include "browser/NavController.h"
+#include "browser/PeekFolderViewController.h"
+#include "platform/components/DocumentListAction.h"
+#include "platform/components/DocumentListController.h"
+#include "platform/ui/AlertController.h"
+#include "platform/ui/SearchPresentation.h"
+#include "platform/ui/View.h"
+#include "platform/ui/Window.h"
+#include "preview/LookwellItemController.h"
+#include "preview/PreviewItemManager.h"
+#include "prompts/UIUtils.h"
+#include "tests/browser/support/BrowserFixture.h"
+
+#include <gmock/gmock.h>
+
+#include <filesystem>
+
+namespace tarrow {
+namespace {
+
+using namespace testing_support;
+using platform::Url;
+using platform::components::DocumentListAction;
+using platform::components::DocumentListController;
+using platform::ui::SearchPresentation;
+using testing::ElementsAre;
+
+constexpr auto top = "BrindleDefault";
+
+class NavigationTest : public BrowserFixture {
+protected:
+    void tapFolder(const Url& folder)
+    {
+        browser->documentListControllerDidSelectContainerWithViewController(
+            topList(), DocumentListController::initWithURL(folder));
+        settle();
+    }
+    void tap(const Url& item)
+    {
+        browser->documentListControllerDidSelectItemAtURL(topList(), item);
+        settle();
+    }
+    std::shared_ptr<SearchPresentation> search() const
+    {
+        return std::dynamic_pointer_cast<SearchPresentation>(browser->presentedViewController());
+    }
+    void openSearch()
+    {
+        topList()->startSearchWithQueryStringBecomeFirstResponder("note", true);
+        settle();
+        ASSERT_NE(search(), nullptr);
+    }
+};
+
+TEST_F(NavigationTest, AFolderIsPushedAndConfigured)
+{
+    write("Folder/a.txt");
+    launch();
+    tapFolder(url("Folder"));
+    EXPECT_THAT(stack(), ElementsAre(top, "Folder"));
+    EXPECT_EQ(topList()->delegate(), browser);
+    EXPECT_EQ(topList()->view()->style().background, platform::Color::white());
+    EXPECT_EQ(browser->viewTitle(), "Folder");
+    EXPECT_TRUE(topList()->availableActions() & actionBit(DocumentListAction::PressurePop));
+    EXPECT_EQ(topList()->toolbarItems().size(), 3);
+    EXPECT_THAT(log->activities(), testing::Contains("Selected Folder (dlc)"));
+
+    browser->documentListControllerDidSelectContainerWithViewController(topList(), nullptr);
+    tapFolder(url("Folder"));
+    EXPECT_EQ(log->count("WARNING New DLC is nil"), 1);
+    EXPECT_EQ(browser->viewControllers().size(), 3);
+}
+
+TEST_F(NavigationTest, ADocumentIsPreviewedInTheModeThatFits)
+{
+    struct Row {
+        const char* name;
+        int mode;
+    };
+    launch();
+    for (const Row row : {Row{"note.txt", PreviewModeQuick}, {"archive.zip", PreviewModeDetails}}) {
+        write(row.name);
+        browser->documentListControllerDidSelectItemAtURL(topList(), url(row.name));
+        EXPECT_EQ(browser->itemManager(), nullptr) << "the list ends its handling of the tap first";
+        settle();
+        EXPECT_THAT(stack(), ElementsAre(top, "*"));
+        ASSERT_NE(browser->itemManager(), nullptr);
+        EXPECT_EQ(browser->itemManager()->mode(), row.mode);
+
+        const auto manager = browser->itemManager();
+        EXPECT_TRUE(manager->filePresenterRegistered());
+        browser->popViewController(false);
+        settle();
+        EXPECT_EQ(browser->itemManager(), nullptr) << "a folder list is on top again";
+        EXPECT_FALSE(manager->filePresenterRegistered());
+    }
+}
+
+TEST_F(NavigationTest, AVanishedItemIsSaidAndTheBrowserStartsAnew)
+{
+    write("Folder/a.txt");
+    launch();
+    tapFolder(url("Folder"));
+    const auto before = browser->quotaFetcher();
+    browser->documentListControllerDidSelectItemAtURL(topList(), url("Folder/gone.txt"));
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_THAT(alert()->title(), testing::HasSubstr("gone.txt"));
+    EXPECT_THAT(stack(), ElementsAre(top, "Folder"));
+    settle();
+    EXPECT_THAT(stack(), ElementsAre(top));
+    EXPECT_NE(browser->quotaFetcher(), before);
+    ASSERT_NE(alert(), nullptr) << "the message stays until it was read";
+    EXPECT_TRUE(alert()->press(0));
+    EXPECT_EQ(alert(), nullptr);
+}
+
+TEST_F(NavigationTest, LinksAreFollowedOneStepInsideTheDrive)
+{
+    write("Folder/note.txt");
+    write("Folder/archive.zip");
+    const auto outside = drive.folder().write("outside.txt", "secret");
+    struct Row {
+        const char* name;
+        std::string target;
+        std::vector<std::string> expectedStack;
+        const char* log;
+    };
+    const std::vector<std::string> unmoved{top};
+    const Row rows[] = {
+        {"document", "Folder/note.txt", {top, "*"}, ""},
+        {"folder", "Folder", {top, "Folder"}, "DEBUG Building DLC stack for symlink to "},
+        {"outside", outside, unmoved, "DEBUG DLC Selection is symlink to outside target: "},
+        {"dangling", "Folder/nothing", unmoved, "DLC Selection is symlink"},
+        {"second-step-outside", "outside", unmoved, "DEBUG DLC Selection is symlink to"},
+        {"itself", "itself", {top, "*"}, ""},
+    };
+    launch();
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        drive.writeLink(row.name, row.target);
+        log->clear();
+        tap(url(row.name));
+        EXPECT_EQ(stack(), row.expectedStack);
+        EXPECT_THAT(log->lines(), testing::Contains(testing::HasSubstr(row.log)));
+        browser->popToRootViewController(false);
+        settle();
+    }
+}
+
+TEST_F(NavigationTest, WarpsReplaceTheStackOrAreRefused)
+{
+    write("Folder/Sub/note.txt");
+    drive.makeFolder("../../documents-evil/Folder");
+    std::filesystem::create_directories(drive.layout().trash() + "/Old");
+    const auto trashed = Url::fileURL(drive.layout().trash() + "/Old");
+    drive.writeLink("way-out", drive.folder().path().string());
+    drive.folder().write("secret.txt", "secret");
+    struct Row {
+        const char* name;
+        std::optional<Url> target;
+        std::vector<std::string> expectedStack; ///< empty: refused
+    };
+    const Row rows[] = {
+        {"the top", url(""), {top}},
+        {"a folder", url("Folder/Sub"), {top, "Folder", "Sub"}},
+        {"a document", url("Folder/Sub/note.txt"), {top, "Folder", "Sub", "*"}},
+        {"nothing", std::nullopt, {}},
+        {"a missing item", url("Folder/gone.txt"), {}},
+        {"below a document", url("Folder/Sub/note.txt/more"), {}},
+        {"in the trash", trashed, {}},
+        {"outside", Url::fileURL("/etc/passwd"), {}},
+        {"a neighbour with the same beginning", url("../../documents-evil/Folder"), {}},
+        {"upwards", url("Folder/../../../../secret.txt"), {}},
+        {"through a link", url("way-out/secret.txt"), {}},
+    };
+    launch();
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        UIUtils::showAlertMessageParentViewController("In the way", "", browser);
+        const bool warped = browser->warpToNewURLPreviewMode(row.target, PreviewModeQuick);
+        settle();
+        EXPECT_EQ(warped, !row.expectedStack.empty());
+        EXPECT_EQ(stack(), warped ? row.expectedStack : std::vector<std::string>{top});
+        EXPECT_EQ(alert(), nullptr) << "what lay over the stack was dismissed";
+        browser->popToRootViewController(false);
+        settle();
+    }
+}
+
+TEST_F(NavigationTest, ASearchOpensAtTheTopOnceTheStackHasSettled)
+{
+    write("Folder/note.txt");
+    for (const char* query : {"", "note"}) {
+        launch();
+        browser->warpToNewURLPreviewMode(url("Folder"), PreviewModeQuick);
+        settle();
+        UIUtils::showAlertMessageParentViewController("In the way", "", browser);
+        browser->startSearch(query);
+        EXPECT_THAT(stack(), ElementsAre(top));
+        EXPECT_EQ(alert(), nullptr);
+        dispatch->advance(0.6);
+        EXPECT_EQ(search(), nullptr);
+        dispatch->advance(0.2);
+        ASSERT_NE(search(), nullptr);
+        EXPECT_EQ(search()->query(), query);
+        EXPECT_TRUE(search()->hasFocus());
+    }
+}
+
+TEST_F(NavigationTest, AFolderThatWasSearchedForIsShownInItsRealPlace)
+{
+    write("Folder/Sub/note.txt");
+    launch();
+    openSearch();
+    tapFolder(url("Folder/Sub"));
+    EXPECT_EQ(search(), nullptr);
+    EXPECT_THAT(stack(), ElementsAre(top, "Folder", "Sub"));
+
+    openSearch();
+    const auto elsewhere = Url::fileURL(drive.folder().path().string());
+    tapFolder(elsewhere);
+    EXPECT_EQ(search(), nullptr);
+    EXPECT_THAT(stack(), ElementsAre(top, "Folder", "Sub", elsewhere.lastPathComponent()));
+}
+
+TEST_F(NavigationTest, AnUnchangedCountIsLoggedOnce)
+{
+    write("Folder/a.txt");
+    write("Folder/b.txt");
+    launch();
+    browser->warpToNewURLPreviewMode(url("Folder"), PreviewModeQuick);
+    settle();
+    const auto line = "DEBUG DLC items changed, count is 2";
+    const auto logged = log->count(line);
+    browser->documentListControllerItemsChanged(topList());
+    browser->documentListControllerItemsChanged(topList());
+    EXPECT_EQ(log->count(line), logged);
+    EXPECT_EQ(logged, 1);
+}
+
+TEST_F(NavigationTest, ARemovedFolderIsLeft)
+{
+    write("Folder/a.txt");
+    launch();
+    tapFolder(url("Folder"));
+    std::filesystem::remove_all(url("Folder").path());
+    topList()->refresh();
+    settle();
+    EXPECT_THAT(stack(), ElementsAre(top));
+}
+
+TEST_F(NavigationTest, APeekShowsFoldersAndDocuments)
+{
+    write("Folder/note.txt");
+    drive.writeLink("link", "Folder/note.txt");
+    launch();
+    const auto peek = [this](const char* name) {
+        return browser->documentListControllerViewControllerForPreviewingItemAtURL(topList(), url(name));
+    };
+    const auto folder = std::dynamic_pointer_cast<PeekFolderViewController>(peek("Folder"));
+    ASSERT_NE(folder, nullptr);
+    EXPECT_EQ(folder->presentedURL(), url("Folder"));
+    EXPECT_FALSE(folder->shouldShowSearch());
+
+    EXPECT_EQ(peek("Folder/note.txt"), LookwellItemController::defaultController());
+    EXPECT_EQ(browser->itemManager()->item()->url(), url("Folder/note.txt"));
+
+    for (const char* name : {"gone.txt", "link"}) {
+        log->clear();
+        EXPECT_EQ(peek(name), nullptr) << name;
+        EXPECT_EQ(log->count("DEBUG URL is not a regular file, package, or folder"), 1);
+        EXPECT_THAT(log->activities(), ElementsAre("DLC Action Firmtap Peek"));
+    }
+}
+
+TEST_F(NavigationTest, APopOpensWhatWasPeekedAt)
+{
+    write("Folder/Sub/note.txt");
+    launch();
+    const auto peekAndPop = [this](const char* name) {
+        browser->documentListControllerViewControllerForPreviewingItemAtURL(topList(), url(name));
+        int completions = 0;
+        browser->documentListControllerPerformActionURLOriginatingViewCompletion(topList(),
+            static_cast<int>(DocumentListAction::PressurePop), url(name), nullptr, [&] { ++completions; });
+        settle();
+        EXPECT_EQ(completions, 1);
+    };
+    peekAndPop("Folder/Sub");
+    EXPECT_THAT(stack(), ElementsAre(top, "Folder", "Sub"));
+    peekAndPop("Folder/Sub/note.txt");
+    EXPECT_THAT(stack(), ElementsAre(top, "Folder", "Sub", "*"));
+    EXPECT_EQ(browser->itemManager()->item()->url(), url("Folder/Sub/note.txt"));
+
+    browser->popToRootViewController(false);
+    settle();
+    openSearch();
+    peekAndPop("Folder/Sub/note.txt");
+    EXPECT_EQ(search(), nullptr);
+    EXPECT_THAT(stack(), ElementsAre(top, "Folder", "Sub", "*"))
+        << "what was searched for is shown in its real place";
+}
+
+} // namespace
+} // namespace tarrow

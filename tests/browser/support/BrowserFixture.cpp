@@ -1,0 +1,111 @@
+#include "tests/browser/support/BrowserFixture.h"
+
+#include "host/system/GettextLocalization.h"
+#include "host/system/IcuFormatters.h"
+#include "host/system/UserLocale.h"
+#include "platform/Localization.h"
+#include "platform/PreviewSupport.h"
+#include "platform/components/DocumentListController.h"
+#include "platform/ui/AlertController.h"
+#include "platform/ui/Window.h"
+#include "preview/LookwellItemController.h"
+#include "tests/browser/support/PlainFolderLister.h"
+
+namespace testing_support {
+
+using platform::components::DocumentListController;
+using platform::ui::Window;
+
+namespace {
+
+/// Everything but archives can be previewed.
+class NoArchives : public platform::PreviewSupport {
+public:
+    bool canPreview(const platform::Url& url) const override { return url.pathExtension() != "zip"; }
+};
+
+std::shared_ptr<platform::Localization> englishTexts()
+{
+    return std::make_shared<host::system::GettextLocalization>(
+        TRW_LOCALE_FOLDER, host::system::UserLocale{"en", "en_US"});
+}
+
+/// A service of a set that somebody else keeps.
+template <typename T>
+std::shared_ptr<T> borrowed(T& service)
+{
+    return std::shared_ptr<T>(std::shared_ptr<void>(), &service);
+}
+
+} // namespace
+
+BrowserFixture::BrowserFixture()
+{
+    cloud = std::make_shared<SimulatedCloud>(drive.cloud);
+    platform::ServiceSet set;
+    set.cloudDocumentService = cloud;
+    set.dispatch = drive.dispatch;
+    set.fileCoordinator = borrowed(_driveServices.fileCoordinator());
+    set.fileSystem = borrowed(_driveServices.fileSystem());
+    set.folderLister = std::make_shared<PlainFolderLister>(drive.dispatch);
+    set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
+    set.keyedArchiver = borrowed(_driveServices.keyedArchiver());
+    set.localization = englishTexts();
+    set.notificationCenter = drive.notifications;
+    set.previewSupport = std::make_shared<NoArchives>();
+    set.storageOfferManager = offers;
+    set.typeRegistry = borrowed(_driveServices.typeRegistry());
+    set.userDefaults = borrowed(_driveServices.userDefaults());
+    platform::installServices(std::move(set));
+}
+
+BrowserFixture::~BrowserFixture()
+{
+    browser = nullptr;
+    window = nullptr;
+}
+
+void BrowserFixture::launchWithoutListing()
+{
+    browser = std::make_shared<tarrow::NavController>();
+    window = std::make_shared<Window>(platform::Rect{0, 0, 400, 800});
+    window->setRootViewController(browser);
+    window->makeKeyAndVisible();
+}
+
+void BrowserFixture::launch()
+{
+    launchWithoutListing();
+    settle();
+}
+
+void BrowserFixture::post(platform::Notification notice)
+{
+    drive.notifications->post(notice);
+    settle();
+}
+
+std::vector<std::string> BrowserFixture::stack() const
+{
+    std::vector<std::string> names;
+    for (const auto& screen : browser->viewControllers()) {
+        const auto list = std::dynamic_pointer_cast<DocumentListController>(screen);
+        if (list)
+            names.push_back(list->presentedURL() ? list->presentedURL()->lastPathComponent() : "");
+        else
+            names.emplace_back(std::dynamic_pointer_cast<tarrow::LookwellItemController>(screen) ? "*" : "-");
+    }
+    return names;
+}
+
+std::shared_ptr<platform::ui::AlertController> BrowserFixture::alert() const
+{
+    return std::dynamic_pointer_cast<platform::ui::AlertController>(browser->presentedViewController());
+}
+
+std::string BrowserFixture::itemsText(std::size_t count)
+{
+    return platform::localizedPlural(".DICT.ITEMS.%d", {static_cast<std::int64_t>(count)});
+}
+
+} // namespace testing_support

@@ -1,0 +1,70 @@
+#pragma once
+
+#include "browser/NavController.h"
+#include "items/DRItem.h"
+#include "platform/StateCoder.h"
+#include "platform/UserDefaults.h"
+#include "tests/support/DriveFixture.h"
+#include "tests/support/SimulatedCloud.h"
+#include "tests/support/SimulatedOffers.h"
+
+#include <gtest/gtest.h>
+
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace platform::components {
+class DocumentListController;
+}
+namespace platform::ui {
+class AlertController;
+class Window;
+} // namespace platform::ui
+
+namespace testing_support {
+
+/// A browser in a window, on the real store in a temporary folder. Only the account's token, the quota and
+/// the storage offers are simulated, and the clock.
+class BrowserFixture : public testing::Test {
+protected:
+    using List = std::shared_ptr<platform::components::DocumentListController>;
+
+    BrowserFixture();
+    ~BrowserFixture() override;
+
+    /// Makes a new browser and shows it; its root list has reported its contents.
+    void launch();
+    void launchWithoutListing();
+    /// Runs everything that is due now.
+    void settle() { drive.settle(); }
+    /// Posts a notice and runs what it leads to.
+    void post(platform::Notification notice);
+
+    platform::Url url(std::string_view relativePath) const { return drive.url(relativePath); }
+    platform::Url write(std::string_view relativePath, std::string_view content = "content") const
+    {
+        return drive.writeDocument(relativePath, content);
+    }
+    static platform::UserDefaults& defaults() { return platform::services().userDefaults(); }
+    List topList() const { return browser->getTopDocumentListController(); }
+    /// The last names of the folders that the stack shows, "*" for a preview and "-" for another screen.
+    std::vector<std::string> stack() const;
+    std::shared_ptr<platform::ui::AlertController> alert() const;
+    /// The text of a number of items, as the catalogue has it.
+    static std::string itemsText(std::size_t count);
+
+    DriveFixture drive;
+    const std::shared_ptr<RecordingLog>& log = drive.log;
+    const std::shared_ptr<VirtualDispatch>& dispatch = drive.dispatch;
+    std::shared_ptr<SimulatedCloud> cloud;
+    std::shared_ptr<SimulatedOffers> offers = std::make_shared<SimulatedOffers>();
+    std::shared_ptr<platform::ui::Window> window;
+    std::shared_ptr<tarrow::NavController> browser;
+
+private:
+    platform::Services _driveServices = platform::services();
+};
+
+} // namespace testing_support

@@ -1,0 +1,34 @@
+#pragma once
+
+#include "platform/StorageOffers.h"
+
+namespace testing_support {
+
+/// Storage offers that the test chooses.
+class SimulatedOffers : public platform::StorageOfferManager {
+public:
+    bool fetchStarts = false; ///< whether asking for the offer starts a fetch
+    std::shared_ptr<const platform::StorageOffer> offer;
+    bool hasDefaultAction = false;
+    int performedActions = 0;
+
+    bool fetchOfferIfNeeded() override { return fetchStarts; }
+    std::shared_ptr<const platform::StorageOffer> currentOffer() const override { return offer; }
+    bool performDefaultAction(const platform::StorageOfferLink&) override
+    {
+        performedActions += hasDefaultAction ? 1 : 0;
+        return hasDefaultAction;
+    }
+
+    static std::shared_ptr<platform::StorageOffer> make(int level, bool storageIsLow, int action = 3)
+    {
+        auto made = std::make_shared<platform::StorageOffer>();
+        made->level = level;
+        made->storageIsLow = storageIsLow;
+        made->buttonTitle = "Upgrade";
+        made->link.action = action;
+        return made;
+    }
+};
+
+} // namespace testing_support
