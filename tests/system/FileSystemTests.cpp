@@ -132,12 +132,12 @@ TEST_F(FileSystemTest, EnumerationStopsWhenAskedAndReportsFoldersThatCannotBeRea
 
 TEST_F(FileSystemTest, WalksThousandsOfLevelsWithFewDescriptors)
 {
-    constexpr int depth = 3000;
+    constexpr int depth = 1200;
     int folder = ::open(directory.path().c_str(), O_RDONLY | O_DIRECTORY);
     for (int i = 0; i < depth; ++i) {
         // Two at each level, so that the walk comes back to every one of them.
-        ASSERT_EQ(::mkdirat(folder, "a", 0700) | ::mkdirat(folder, "b", 0700), 0);
-        const int next = ::openat(folder, "a", O_RDONLY | O_DIRECTORY);
+        ASSERT_EQ(::mkdirat(folder, "level", 0700) | ::mkdirat(folder, "other", 0700), 0);
+        const int next = ::openat(folder, "level", O_RDONLY | O_DIRECTORY);
         ::close(folder);
         folder = next;
     }

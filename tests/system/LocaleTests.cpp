@@ -1,6 +1,6 @@
 #include "host/system/GettextLocalization.h"
-#include "host/system/UnicodeCharacterData.h"
 #include "host/system/IcuFormatters.h"
+#include "host/system/UnicodeCharacterData.h"
 #include "host/system/UserLocale.h"
 #include "platform/Services.h"
 

@@ -1,0 +1,185 @@
+// A folder's list, sorted and ready on the main queue, beside its floor: getdents64 and statx of everything
+// in the same folder in one thread. Each size prints the ratio as "x_floor" and, for large folders, when the
+// first rows came.
+//
+// The folder is made under TMPDIR (/tmp). Run on an idle machine; the list uses all cores, the floor one.
+
+#include "host/system/DirectoryReader.h"
+#include "host/system/EntryClassifier.h"
+#include "host/system/GLibDispatch.h"
+#include "host/system/NameOrder.h"
+#include "host/system/ThreadedFolderLister.h"
+
+#include <benchmark/benchmark.h>
+#include <glib.h>
+
+#include <fcntl.h>
+#include <sys/stat.h>
+
+#include <algorithm>
+#include <chrono>
+#include <cstdlib>
+#include <filesystem>
+#include <map>
+#include <random>
+
+namespace {
+
+using Clock = std::chrono::steady_clock;
+using host::system::DirectoryReader;
+using platform::FolderSnapshot;
+using platform::ListingStage;
+
+double milliseconds(Clock::duration duration)
+{
+    return std::chrono::duration<double, std::milli>(duration).count();
+}
+
+/// Folders of documents with ordinary names, made once for each size and removed at the end.
+class Folders {
+public:
+    ~Folders()
+    {
+        for (const auto& [size, path] : _paths)
+            std::filesystem::remove_all(path);
+    }
+    const std::string& ofSize(int size)
+    {
+        auto& path = _paths[size];
+        if (path.empty())
+            path = make(size);
+        return path;
+    }
+
+private:
+    static std::string make(int size)
+    {
+        auto pattern = (std::filesystem::temp_directory_path() / "tarrow-bench-XXXXXX").string();
+        if (!mkdtemp(pattern.data()))
+            std::abort();
+        static constexpr const char* stems[] = {
+            "Invoice", "Minutes of the meeting", "IMG_", "Résumé", "photo"};
+        static constexpr const char* extensions[] = {".pdf", ".txt", ".jpg", ".docx", ""};
+        std::mt19937 random(1);
+        for (int i = 0; i < size; ++i) {
+            const auto name = pattern + '/' + stems[random() % 5] + ' ' + std::to_string(random() % 1'000'000)
+                + ' ' + std::to_string(i) + extensions[random() % 5];
+            if (i % 20 == 0)
+                ::mkdir(name.c_str(), 0700);
+            else
+                ::close(::open(name.c_str(), O_CREAT | O_WRONLY | O_CLOEXEC, 0600));
+        }
+        return pattern;
+    }
+    std::map<int, std::string> _paths;
+};
+
+Folders& folders()
+{
+    static Folders instance;
+    return instance;
+}
+
+double floorOnce(const std::string& path)
+{
+    const auto begin = Clock::now();
+    const auto folder = host::system::openFolder(path);
+    DirectoryReader reader(folder);
+    struct statx found;
+    while (const auto entry = reader.next()) {
+        statx(folder.get(), entry->name.data(), AT_SYMLINK_NOFOLLOW, STATX_BASIC_STATS, &found);
+        benchmark::DoNotOptimize(found.stx_size);
+    }
+    return milliseconds(Clock::now() - begin);
+}
+
+struct ListTimes {
+    double firstRows = 0, complete = 0;
+    std::size_t count = 0;
+};
+
+ListTimes listOnce(host::system::ThreadedFolderLister& lister, const std::string& path)
+{
+    ListTimes times;
+    const auto begin = Clock::now();
+    const auto listing =
+        lister.list(platform::Url::fileURL(path), {}, [&](std::shared_ptr<const FolderSnapshot> snapshot) {
+            const auto now = milliseconds(Clock::now() - begin);
+            if (times.firstRows == 0)
+                times.firstRows = now;
+            if (snapshot->stage() == ListingStage::Complete) {
+                times.complete = now;
+                times.count = snapshot->count();
+            }
+        });
+    while (times.complete == 0)
+        g_main_context_iteration(nullptr, TRUE);
+    return times;
+}
+
+double median(std::vector<double> values)
+{
+    std::ranges::sort(values);
+    return values[values.size() / 2];
+}
+
+void listFolder(benchmark::State& state)
+{
+    const auto& path = folders().ofSize(static_cast<int>(state.range(0)));
+    const auto dispatch = std::make_shared<host::system::GLibDispatch>();
+    host::system::ThreadedFolderLister lister(
+        dispatch, std::make_shared<host::system::MimeTypeRegistry>(), "en_US");
+    listOnce(lister, path);
+    floorOnce(path);
+    std::vector<double> complete, firstRows, floors;
+    for (auto _ : state) {
+        const auto times = listOnce(lister, path);
+        if (times.count != static_cast<std::size_t>(state.range(0)))
+            state.SkipWithError("the list is not whole");
+        state.SetIterationTime(times.complete / 1000);
+        complete.push_back(times.complete);
+        firstRows.push_back(times.firstRows);
+        floors.push_back(floorOnce(path));
+    }
+    state.counters["ready_ms"] = median(complete);
+    state.counters["first_ms"] = median(firstRows);
+    state.counters["floor_ms"] = median(floors);
+    state.counters["x_floor"] = median(complete) / median(floors);
+}
+BENCHMARK(listFolder)->Arg(1'000)->Arg(10'000)->Arg(100'000)->UseManualTime()->Unit(benchmark::kMillisecond);
+
+/// Of the list's work, what one thread does for each name: its kind and its sort key.
+void classifyAndKey(benchmark::State& state)
+{
+    const host::system::EntryClassifier classifier(std::make_shared<host::system::MimeTypeRegistry>());
+    const host::system::NameOrder order("en_US");
+    std::vector<std::uint8_t> keys;
+    for (auto _ : state) {
+        keys.clear();
+        const auto entry =
+            classifier.classify("Minutes of the meeting 2024.txt", platform::FileType::Regular);
+        order.appendKey(entry->name, keys);
+        benchmark::DoNotOptimize(keys.data());
+    }
+}
+BENCHMARK(classifyAndKey);
+
+void typeOfKnownExtension(benchmark::State& state)
+{
+    const host::system::MimeTypeRegistry types;
+    for (auto _ : state)
+        benchmark::DoNotOptimize(types.typeForExtension("JPG"));
+}
+BENCHMARK(typeOfKnownExtension);
+
+void typeOfOtherExtension(benchmark::State& state)
+{
+    const host::system::MimeTypeRegistry types;
+    for (auto _ : state)
+        benchmark::DoNotOptimize(types.typeForExtension("scala"));
+}
+BENCHMARK(typeOfOtherExtension);
+
+} // namespace
+
+BENCHMARK_MAIN();

@@ -1,0 +1,62 @@
+#pragma once
+
+#include "platform/FolderSnapshot.h"
+
+#include <compare>
+#include <cstdint>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace host::system {
+
+class NameOrder;
+
+/// A part of a folder's entries: gathered by one thread, then sorted by itself, then merged with the others.
+class ListingBlock {
+public:
+    /// Packs an entry; the name is copied. `extra` is the index of the extra item behind it, or -1.
+    void append(const platform::FolderEntry& entry, std::int32_t extra = -1);
+    std::size_t count() const { return _entries.size(); }
+    std::size_t nameBytes() const { return _names.size(); }
+
+    /// Sorts the block. Entries keep their numbers; rank() tells their places.
+    void sort(const NameOrder& order);
+
+    /// The entry at a number; the name lives as long as the block, once nothing more is appended.
+    platform::FolderEntry entry(std::size_t number) const;
+    std::int32_t extra(std::size_t number) const { return _entries[number].extra; }
+
+    /// The number of the entry at a place of the sorted block.
+    std::size_t numberAt(std::size_t place) const { return _ranks[place].number; }
+    /// Whether the entry at a place comes before the one at a place of another block.
+    bool isBefore(std::size_t place, const ListingBlock& other, std::size_t otherPlace) const
+    {
+        return compare(_ranks[place], other, other._ranks[otherPlace]) < 0;
+    }
+
+private:
+    struct Entry {
+        std::uint32_t nameOffset;
+        std::uint16_t nameLength;
+        platform::FolderEntryKind kind;
+        bool isPromise;
+        std::int32_t extra;
+    };
+    /// Enough of an entry's sort key to tell nearly all of them apart without looking the key up.
+    struct Rank {
+        std::uint64_t high, low;
+        std::uint32_t number;
+        std::uint32_t keyOffset;
+        std::uint32_t keyLength;
+    };
+    Rank makeRank(std::size_t number, std::size_t keyOffset) const;
+    std::strong_ordering compare(const Rank& a, const ListingBlock& other, const Rank& b) const;
+
+    std::string _names;
+    std::vector<Entry> _entries;
+    std::vector<std::uint8_t> _keys;
+    std::vector<Rank> _ranks;
+};
+
+} // namespace host::system

@@ -1,0 +1,29 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace host::system {
+
+/// The natural order of names in a language: letters as its dictionaries have them, case and accents only to
+/// break ties, "file 2" before "file 10". Any thread.
+class NameOrder {
+public:
+    /// `locale` as ICU names it.
+    explicit NameOrder(const std::string& locale);
+    NameOrder(NameOrder&&) noexcept;
+    ~NameOrder();
+
+    /// Appends the name's sort key, bytes to be compared as such. Bytes that are no UTF-8 sort like the
+    /// replacement character.
+    void appendKey(std::string_view name, std::vector<std::uint8_t>& keys) const;
+
+private:
+    struct Data;
+    std::unique_ptr<Data> _data;
+};
+
+} // namespace host::system

@@ -1,0 +1,34 @@
+#pragma once
+
+#include "platform/FolderLister.h"
+
+#include <memory>
+#include <string>
+
+namespace platform {
+class Dispatch;
+}
+
+namespace host::system {
+
+class MimeTypeRegistry;
+struct ListingTools;
+
+/// Lists folders by reading their names alone, on all cores, and watches them afterwards. A folder that
+/// changes without end is read again a few times in a second, and less often when reading takes long.
+class ThreadedFolderLister : public platform::FolderLister {
+public:
+    /// `locale` chooses the order of names, as ICU names it.
+    ThreadedFolderLister(std::shared_ptr<platform::Dispatch> dispatch,
+        std::shared_ptr<const MimeTypeRegistry> types, const std::string& locale);
+    ~ThreadedFolderLister() override;
+
+    std::shared_ptr<platform::FolderListing> list(const platform::Url& folder,
+        std::vector<platform::FolderSnapshot::ExtraItem> extraItems, Update update) override;
+
+private:
+    std::shared_ptr<platform::Dispatch> _dispatch;
+    std::shared_ptr<const ListingTools> _tools;
+};
+
+} // namespace host::system
