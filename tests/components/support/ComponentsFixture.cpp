@@ -4,6 +4,7 @@
 #include "host/system/GettextLocalization.h"
 #include "host/system/IcuFormatters.h"
 #include "host/system/UserLocale.h"
+#include "platform/PreviewSupport.h"
 #include "platform/ui/ListView.h"
 
 #include <utility>
@@ -14,6 +15,11 @@ using platform::Url;
 using platform::components::DocumentListController;
 
 namespace {
+
+class EverythingHasAPreview : public platform::PreviewSupport {
+public:
+    bool canPreview(const Url&) const override { return true; }
+};
 
 /// A service of a set that somebody else keeps.
 template <typename T>
@@ -84,6 +90,7 @@ ComponentsFixture::ComponentsFixture()
     set.localization = std::make_shared<host::system::GettextLocalization>(
         TRW_LOCALE_FOLDER, host::system::UserLocale{"en", "en_US"});
     set.notificationCenter = drive.notifications;
+    set.previewSupport = std::make_shared<EverythingHasAPreview>();
     set.storageOfferManager = borrowed(_driveServices.storageOfferManager());
     set.typeRegistry = borrowed(_driveServices.typeRegistry());
     platform::installServices(std::move(set));

@@ -1,0 +1,219 @@
+#include "platform/components/PlaceholderView.h"
+#include "platform/components/PreviewContent.h"
+#include "platform/components/PreviewController.h"
+#include "platform/components/PreviewLoader.h"
+#include "platform/components/TextDecoding.h"
+#include "platform/ui/ImageView.h"
+#include "platform/ui/Label.h"
+#include "platform/ui/Screen.h"
+#include "platform/ui/TextView.h"
+#include "platform/ui/ViewVisitor.h"
+#include "tests/components/support/ComponentsFixture.h"
+
+#include <gmock/gmock.h>
+#include <sys/stat.h>
+
+#include <filesystem>
+
+using namespace platform;
+using namespace platform::components;
+using testing::HasSubstr;
+using testing_support::ComponentsFixture;
+using Kind = PreviewContent::Kind;
+
+namespace {
+
+/// Shows the documents that the test puts in.
+struct Documents : PreviewControllerDataSource {
+    std::size_t numberOfPreviewItemsInPreviewController(const PreviewController&) const override
+    {
+        return urls.size();
+    }
+    Url previewControllerPreviewItemAtIndex(const PreviewController&, std::size_t index) const override
+    {
+        return urls[index];
+    }
+    std::vector<Url> urls;
+};
+
+class Preview : public ComponentsFixture {
+protected:
+    Preview()
+    {
+        screen->setDataSource(documents);
+        screen->view()->setFrame({0, 0, 360, 600});
+    }
+    void show(std::vector<Url> urls)
+    {
+        documents->urls = std::move(urls);
+        screen->reloadData();
+    }
+    const PlaceholderView::Content& placeholder() const
+    {
+        const auto view = std::dynamic_pointer_cast<PlaceholderView>(screen->view()->subviews().back());
+        static const PlaceholderView::Content none;
+        return view ? view->content() : none;
+    }
+
+    std::shared_ptr<Documents> documents = std::make_shared<Documents>();
+    std::shared_ptr<PreviewController> screen = std::make_shared<PreviewController>();
+};
+
+constexpr std::string_view twoPixels = "P6 2 1 255\n\xFF\x80\x01\x02\x03\x04";
+
+struct Row {
+    const char* name;
+    std::string_view content;
+    Kind kind;
+    const char* note; ///< a part of it
+};
+
+TEST_F(Preview, ChoosesWhatToShowByTheDocument)
+{
+    const Row rows[] = {
+        {"Picture.png", twoPixels, Kind::Image, ""},
+        {"Broken.png", "no picture at all", Kind::Failure, "damaged"},
+        {"Notes.txt", "Hello", Kind::Text, ""},
+        {"Empty.txt", "", Kind::Text, ""},
+        {"Plan.pdf", "%PDF-1.4", Kind::Summary, "PDF document · 8 bytes"},
+        {"Unknown.xyz", "bytes", Kind::Summary, "5 bytes"},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        show({drive.writeDocument(row.name, row.content)});
+        EXPECT_FALSE(screen->content());
+        drive.dispatch->runUntilIdle();
+        ASSERT_TRUE(screen->content());
+        EXPECT_EQ(screen->content()->kind, row.kind);
+        EXPECT_EQ(screen->title(), row.name);
+        EXPECT_THAT(screen->content()->note, HasSubstr(row.note));
+    }
+}
+
+TEST_F(Preview, SaysWhyADocumentCannotBeShown)
+{
+    show({drive.url("Gone.txt")});
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->kind, Kind::Failure);
+    EXPECT_FALSE(placeholder().message.empty());
+
+    show({drive.writePromise("Far.txt", {})});
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->kind, Kind::InCloud);
+    EXPECT_THAT(placeholder().message, HasSubstr("in the cloud"));
+    EXPECT_FALSE(std::filesystem::exists(drive.url("Far.txt").path()));
+
+    // A pipe would keep a reader waiting for ever.
+    ASSERT_EQ(::mkfifo(drive.url("Pipe.txt").path().c_str(), 0600), 0);
+    show({drive.url("Pipe.txt")});
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->kind, Kind::Summary);
+
+    show({});
+    EXPECT_EQ(placeholder().title, "Nothing to show");
+}
+
+TEST_F(Preview, CutsLongTextsAndSaysSo)
+{
+    const PreviewLimits limits;
+    std::string text(limits.maxTextBytes - 1, 'x');
+    drive.writeDocument("Fits.txt", text + "y");
+    drive.writeDocument("Long.txt", text + "\xC3\xA4 and more");
+    const auto whole = loadPreview(drive.url("Fits.txt"), limits);
+    EXPECT_EQ(whole.text.size(), limits.maxTextBytes);
+    EXPECT_EQ(whole.note, "");
+    const auto cut = loadPreview(drive.url("Long.txt"), limits);
+    EXPECT_EQ(cut.text.size(), limits.maxTextBytes - 1);
+    EXPECT_THAT(cut.note, HasSubstr("Only the beginning"));
+
+    show({drive.url("Long.txt")});
+    drive.dispatch->runUntilIdle();
+    screen->view()->layoutIfNeeded();
+    const auto parts = screen->view()->subviews().back()->subviews();
+    ASSERT_EQ(parts.size(), 2U);
+    EXPECT_EQ(std::dynamic_pointer_cast<ui::Label>(parts[0])->text(), cut.note);
+    EXPECT_EQ(parts[1]->frame().maxY(), 600);
+    EXPECT_EQ(parts[1]->frame().width, 360);
+}
+
+TEST_F(Preview, ShowsPicturesInAtMostTwiceTheScreensPixels)
+{
+    ui::Screen::setMain(ui::Screen{{0, 0, 10, 5}, 2, ui::UserInterfaceIdiom::Phone, {}});
+    std::string picture = "P6 100 100 255\n";
+    picture.append(30'000, 'z');
+    show({drive.writeDocument("Large.png", picture)});
+    drive.dispatch->runUntilIdle();
+    ui::Screen::setMain(std::nullopt);
+    ASSERT_EQ(screen->content()->kind, Kind::Image);
+    EXPECT_EQ(screen->content()->image->pixelHeight(), 20);
+    const auto view = std::dynamic_pointer_cast<ui::ImageView>(screen->view()->subviews().back());
+    ASSERT_TRUE(view);
+    EXPECT_EQ(view->contentMode(), ui::ContentMode::AspectFit);
+    EXPECT_EQ(view->frame().height, 600);
+}
+
+TEST_F(Preview, IgnoresWhatArrivesForAnEarlierDocument)
+{
+    const auto first = drive.writeDocument("First.txt", "first");
+    const auto second = drive.writeDocument("Second.txt", "second");
+    show({first});
+    show({second});
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->text, "second");
+    EXPECT_EQ(screen->currentPreviewItem(), second);
+
+    drive.writeDocument("Second.txt", "second, changed");
+    screen->refreshCurrentPreviewItem();
+    EXPECT_EQ(screen->content()->text, "second");
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->text, "second, changed");
+    EXPECT_EQ(screen->view()->subviews().size(), 1U);
+}
+
+TEST_F(Preview, ShowsThatItIsLoadingOnlyAfterAWhile)
+{
+    const auto late = std::make_shared<PreviewController>();
+    documents->urls = {drive.writeDocument("Notes.txt", "Hello")};
+    late->setDataSource(documents);
+    late->reloadData();
+    drive.dispatch->runUntilIdle();
+    const auto text = std::dynamic_pointer_cast<ui::TextView>(late->view()->subviews().back());
+    ASSERT_TRUE(text);
+    EXPECT_EQ(text->text(), "Hello");
+    drive.dispatch->advance(1);
+    EXPECT_EQ(late->view()->subviews().back(), text);
+}
+
+struct TextRow {
+    const char* name;
+    std::string_view bytes;
+    TextEnd end;
+    const char* text;
+};
+
+TEST(TextDecoding, UnderstandsTheUsualEncodings)
+{
+    using namespace std::string_view_literals;
+    const TextRow rows[] = {
+        {"UTF-8", "Gr\xC3\xBC\xC3\x9F", TextEnd::Whole, "Grüß"},
+        {"UTF-8 with mark", "\xEF\xBB\xBFhi", TextEnd::Whole, "hi"},
+        {"Latin-1", "Gr\xFC\xDF", TextEnd::Whole, "Grüß"},
+        {"UTF-16 little-endian", "\xFF\xFEh\0\xFC\0"sv, TextEnd::Whole, "hü"},
+        {"UTF-16 big-endian, beyond the first plane", "\xFE\xFF\xD8\x3D\xDE\x00"sv, TextEnd::Whole, "😀"},
+        {"UTF-16 with a lone surrogate", "\xFE\xFF\xDE\x00\0a"sv, TextEnd::Whole, "\uFFFDa"},
+        {"UTF-16 with half a unit", "\xFF\xFEh\0i"sv, TextEnd::Whole, "h"},
+        {"UTF-8 cut within a character", "ab\xE2\x82", TextEnd::Cut, "ab"},
+        {"UTF-8 cut between characters", "ab\xE2\x82\xAC", TextEnd::Cut, "ab€"},
+        {"UTF-16 cut within a pair", "\xFE\xFF\0a\xD8\x3D"sv, TextEnd::Cut, "a"},
+        {"whole, with the end of a character missing", "ab\xE2\x82", TextEnd::Whole, "abâ\u0082"},
+        {"NUL characters", "a\0b"sv, TextEnd::Whole, "ab"},
+        {"nothing", "", TextEnd::Cut, ""},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        EXPECT_EQ(decodedText(row.bytes, row.end), row.text);
+        EXPECT_TRUE(isValidUtf8(decodedText(row.bytes, row.end)));
+    }
+}
+
+} // namespace

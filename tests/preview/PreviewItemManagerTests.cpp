@@ -1,0 +1,157 @@
+#include "preview/PreviewItemManager.h"
+
+#include "items/DRItem.h"
+#include "platform/components/PreviewContent.h"
+#include "platform/ui/NavigationController.h"
+#include "platform/ui/SearchPresentation.h"
+#include "platform/ui/Window.h"
+#include "preview/LookwellItemController.h"
+#include "tests/components/support/ComponentsFixture.h"
+
+#include <gmock/gmock.h>
+
+using namespace platform;
+using namespace tarrow;
+using platform::components::DocumentListController;
+using platform::components::PreviewContent;
+
+namespace {
+
+class Manager : public testing_support::ComponentsFixture {
+protected:
+    Manager()
+    {
+        navigation->setViewControllers({base}, false);
+        window->setRootViewController(navigation);
+        window->makeKeyAndVisible();
+    }
+    ~Manager() override
+    {
+        LookwellItemController::defaultController()->lookwellNewItem(nullptr);
+        manager = nullptr;
+    }
+    std::shared_ptr<DRItem> document(const char* name)
+    {
+        return DRItem::initWithURL(drive.writeDocument(name, "content of " + std::string(name)));
+    }
+    /// The last names of the shown folders, "*" for the preview, "-" for another screen.
+    std::vector<std::string> stack() const
+    {
+        std::vector<std::string> names;
+        for (const auto& screen : navigation->viewControllers()) {
+            const auto list = std::dynamic_pointer_cast<DocumentListController>(screen);
+            names.push_back(list ? list->presentedURL()->lastPathComponent() : screen == preview ? "*" : "-");
+        }
+        return names;
+    }
+
+    std::shared_ptr<ui::NavigationController> navigation = std::make_shared<ui::NavigationController>();
+    std::shared_ptr<ui::ViewController> base = std::make_shared<ui::ViewController>();
+    std::shared_ptr<ui::Window> window = std::make_shared<ui::Window>(Rect{0, 0, 360, 640});
+    std::shared_ptr<PreviewItemManager> manager =
+        PreviewItemManager::newItemManagerWithModeNavController(PreviewModeQuick, navigation);
+    std::shared_ptr<LookwellItemController> preview = LookwellItemController::defaultController();
+};
+
+using Names = std::vector<std::string>;
+
+TEST_F(Manager, PutsOnePreviewOnTopAndShowsTheNextInItsPlace)
+{
+    const auto first = document("First.txt");
+    manager->previewItem(first);
+    EXPECT_EQ(stack(), (Names{"-", "*"}));
+    EXPECT_EQ(preview->itemManager(), manager);
+    EXPECT_EQ(preview->arrayOfDocuments(), std::vector{first->url()});
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(preview->content()->text, "content of First.txt");
+
+    const auto next = PreviewItemManager::newItemManagerWithModeNavController(PreviewModeDetails, navigation);
+    next->previewItem(document("Second.txt"));
+    EXPECT_EQ(stack(), (Names{"-", "*"}));
+    EXPECT_EQ(preview->itemManager(), next);
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(preview->content()->text, "content of Second.txt");
+    EXPECT_TRUE(preview->isVisible());
+    navigation->popViewController(false);
+    EXPECT_FALSE(preview->isVisible());
+}
+
+TEST_F(Manager, OnlyKeepsAnItemThatIsNotToBeShown)
+{
+    manager->setItemUpdatePreview(document("First.txt"), false);
+    EXPECT_EQ(stack(), Names{"-"});
+    EXPECT_FALSE(manager->filePresenterRegistered());
+    EXPECT_TRUE(manager->item());
+    manager->setItem(nullptr);
+    EXPECT_FALSE(manager->item());
+    EXPECT_FALSE(manager->prepareToPreviewItem(nullptr));
+    EXPECT_EQ(drive.log->count("WARNING no preview URL, nothing to show"), 1U);
+}
+
+TEST_F(Manager, IsRegisteredForTheItemThatIsShownWhileTheApplicationIsActive)
+{
+    manager->prepareToPreviewItem(document("First.txt"));
+    EXPECT_TRUE(manager->filePresenterRegistered());
+    drive.notifications->post(Notification::ApplicationWillResignActive);
+    EXPECT_FALSE(manager->filePresenterRegistered());
+    drive.notifications->post(Notification::ApplicationDidBecomeActive);
+    EXPECT_TRUE(manager->filePresenterRegistered());
+    EXPECT_EQ(drive.log->count("DEBUG Becoming active for " + logText(drive.url("First.txt"))), 1U);
+    EXPECT_EQ(drive.log->count("DEBUG Preview: Using LookwellItemController, File Exists"), 1U);
+}
+
+TEST_F(Manager, DismissesASearchBeforeItShowsThePreview)
+{
+    base->presentViewController(std::make_shared<ui::SearchPresentation>(), false);
+    manager->previewItem(document("First.txt"));
+    EXPECT_FALSE(navigation->presentedViewController());
+    EXPECT_EQ(stack(), (Names{"-", "*"}));
+
+    base->presentViewController(std::make_shared<ui::ViewController>(), false);
+    manager->previewItem(document("Second.txt"));
+    EXPECT_TRUE(navigation->presentedViewController());
+}
+
+TEST_F(Manager, LeadsTheStackToAnotherPlace)
+{
+    const auto top = drive.layout().defaultContainer();
+    const auto topName = Url::fileURL(top).lastPathComponent();
+    drive.writeDocument("Documents/Trip/Map.txt");
+    EXPECT_TRUE(manager->warpToNewURL(drive.url("Documents/Trip/Map.txt")));
+    EXPECT_EQ(stack(), (Names{topName, "Documents", "Trip", "*"}));
+    EXPECT_EQ(manager->item()->url(), drive.url("Documents/Trip/Map.txt"));
+    EXPECT_TRUE(manager->filePresenterRegistered());
+
+    base->presentViewController(std::make_shared<ui::ViewController>(), false);
+    EXPECT_TRUE(manager->warpToNewURL(drive.url("Documents")));
+    EXPECT_EQ(stack(), (Names{topName, "Documents"}));
+    EXPECT_FALSE(manager->filePresenterRegistered());
+
+    for (const auto& nowhere : {drive.url("Documents/Gone/File.txt"), Url::fileURL("/usr")}) {
+        EXPECT_FALSE(manager->warpToNewURL(nowhere));
+        EXPECT_EQ(stack(), (Names{topName, "Documents"}));
+    }
+    EXPECT_EQ(
+        drive.log->count("ERROR : Couldn't build DLC stack for " + logText(Url::fileURL("/usr")) + "."), 1U);
+    EXPECT_EQ(drive.log->count("ERROR Can't build DLC stack, can't get directory: "
+                  + logText(drive.url("Documents/Gone/File.txt"))),
+        1U);
+}
+
+TEST_F(Manager, HasNothingToShowWithoutAnItem)
+{
+    preview->lookwellNewItem(manager);
+    EXPECT_FALSE(preview->arrayOfDocuments());
+    EXPECT_FALSE(preview->currentPreviewItem());
+    manager = nullptr;
+    EXPECT_FALSE(preview->itemManager());
+}
+
+TEST_F(Manager, KnowsPdfDocumentsByTheirNames)
+{
+    EXPECT_TRUE(preview->_lwPreviewItemIsPDFKind(drive.url("Plan.pdf")));
+    for (const auto* name : {"Plan.txt", "Plan", "Plan.unknown", "pdf"})
+        EXPECT_FALSE(preview->_lwPreviewItemIsPDFKind(drive.url(name))) << name;
+}
+
+} // namespace
