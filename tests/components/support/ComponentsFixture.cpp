@@ -3,8 +3,8 @@
 #include "host/system/GdkPixbufImageLoader.h"
 #include "host/system/GettextLocalization.h"
 #include "host/system/IcuFormatters.h"
+#include "host/system/TypePreviewSupport.h"
 #include "host/system/UserLocale.h"
-#include "platform/PreviewSupport.h"
 #include "platform/ui/ListView.h"
 
 #include <utility>
@@ -15,11 +15,6 @@ using platform::Url;
 using platform::components::DocumentListController;
 
 namespace {
-
-class EverythingHasAPreview : public platform::PreviewSupport {
-public:
-    bool canPreview(const Url&) const override { return true; }
-};
 
 /// A service of a set that somebody else keeps.
 template <typename T>
@@ -90,9 +85,9 @@ ComponentsFixture::ComponentsFixture()
     set.localization = std::make_shared<host::system::GettextLocalization>(
         TRW_LOCALE_FOLDER, host::system::UserLocale{"en", "en_US"});
     set.notificationCenter = drive.notifications;
-    set.previewSupport = std::make_shared<EverythingHasAPreview>();
     set.storageOfferManager = borrowed(_driveServices.storageOfferManager());
     set.typeRegistry = borrowed(_driveServices.typeRegistry());
+    set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(set.typeRegistry);
     platform::installServices(std::move(set));
 }
 
