@@ -7,6 +7,8 @@
 #include <algorithm>
 #include <string>
 
+extern "C" GResource* trw_resources_get_resource();
+
 namespace host::gtk {
 
 using platform::Color;
@@ -44,6 +46,22 @@ double relativeSize(double pointSize)
     return ratio >= 1 ? ratio : (1 + ratio) / 2;
 }
 
+/// Icons and style sheet of our own, once for the process's display.
+void installResources()
+{
+    static bool isInstalled = false;
+    auto* display = gdk_display_get_default();
+    if (isInstalled || !display)
+        return;
+    isInstalled = true;
+    g_resources_register(trw_resources_get_resource());
+    gtk_icon_theme_add_resource_path(gtk_icon_theme_get_for_display(display), "/app/tarrow/Drive/icons");
+    const auto provider = ObjectRef<GtkCssProvider>::adopt(gtk_css_provider_new());
+    gtk_css_provider_load_from_resource(provider.get(), "/app/tarrow/Drive/kit.css");
+    gtk_style_context_add_provider_for_display(
+        display, GTK_STYLE_PROVIDER(provider.get()), GTK_STYLE_PROVIDER_PRIORITY_APPLICATION);
+}
+
 double settingsDpi()
 {
     int dpi = -1;
@@ -56,6 +74,7 @@ double settingsDpi()
 
 Theme::Theme()
 {
+    installResources();
     auto* style = adw_style_manager_get_default();
     for (const char* signal : {"notify::dark", "notify::high-contrast"})
         _connections.push_back(connectNotify(style, signal, [this] { changed(); }));

@@ -1,0 +1,34 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <variant>
+#include <vector>
+
+namespace host::gtk {
+
+/// What a start of the program asks for.
+struct OpenUrl {
+    std::string url; ///< as it was written, nothing decoded
+    bool operator==(const OpenUrl&) const = default;
+};
+struct OpenSearch {
+    std::optional<std::string> query; ///< nothing: the search shortcut
+    bool operator==(const OpenSearch&) const = default;
+};
+using LaunchRequest = std::variant<OpenUrl, OpenSearch>;
+
+/// The program's arguments.
+struct CommandLine {
+    enum class Mode { Run, Service, Help, Version, Invalid };
+
+    Mode mode = Mode::Run;
+    std::vector<LaunchRequest> requests;
+    std::string complaint; ///< for Invalid: what is wrong, in the user's language
+
+    static CommandLine parse(int argc, const char* const* argv);
+    /// The text of --help, in the user's language.
+    static std::string helpText();
+};
+
+} // namespace host::gtk

@@ -1,0 +1,150 @@
+#include "host/gtk/LayerFactory.h"
+
+#include "host/gtk/AlertContent.h"
+#include "host/gtk/OverlayLayer.h"
+#include "host/gtk/PopoverLayer.h"
+#include "host/gtk/ScreenPeer.h"
+#include "host/gtk/SearchContent.h"
+#include "host/gtk/ViewPeer.h"
+#include "platform/ui/NavigationController.h"
+#include "platform/ui/ViewControllerVisitor.h"
+
+#include <cmath>
+#include <optional>
+
+namespace host::gtk {
+
+namespace ui = platform::ui;
+
+namespace {
+
+constexpr int popoverWidth = 320, popoverHeight = 420; ///< of a screen in a popover, points
+
+/// A whole screen as the content of a layer.
+class ScreenContent : public LayerContent {
+public:
+    ScreenContent(
+        const std::shared_ptr<PeerContext>& context, const std::shared_ptr<ui::ViewController>& screen)
+        : _box(ObjectRef<GtkWidget>::retain(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0)))
+        , _peer(makeScreenPeer(context, screen, WindowButtons::Hidden))
+    {
+        gtk_box_append(GTK_BOX(widget()), _peer->widget());
+    }
+    ~ScreenContent() override { gtk_box_remove(GTK_BOX(widget()), _peer->widget()); }
+
+    GtkWidget* widget() const override { return _box.get(); }
+    void focus() override { _peer->focus(); }
+
+private:
+    ObjectRef<GtkWidget> _box;
+    std::shared_ptr<ScreenPeer> _peer;
+};
+
+std::optional<GdkRectangle> boundsIn(GtkWidget* canvas, GtkWidget* widget, std::optional<platform::Rect> part)
+{
+    graphene_rect_t bounds;
+    if (!widget || !gtk_widget_compute_bounds(widget, canvas, &bounds))
+        return std::nullopt;
+    const auto& rect = part ? *part : platform::Rect{0, 0, bounds.size.width, bounds.size.height};
+    const auto whole = [](double points) { return static_cast<int>(std::lround(points)); };
+    return GdkRectangle{whole(bounds.origin.x + rect.x), whole(bounds.origin.y + rect.y),
+        std::max(1, whole(rect.width)), std::max(1, whole(rect.height))};
+}
+
+/// Where a popover points at, in the window; nothing when there is no such place now.
+std::optional<GdkRectangle> anchorOf(
+    const PeerContext& context, GtkWidget* canvas, const ui::PopoverAnchor& anchor)
+{
+    if (const auto* item = std::get_if<std::weak_ptr<ui::BarButtonItem>>(&anchor)) {
+        const auto shown = item->lock();
+        return shown ? boundsIn(canvas, context.widgetOf(*shown), {}) : std::nullopt;
+    }
+    if (const auto* place = std::get_if<ui::ViewAnchor>(&anchor)) {
+        const auto view = place->view.lock();
+        const auto* peer = view ? context.peerOf(*view) : nullptr;
+        return peer ? boundsIn(canvas, peer->widget(), place->rect) : std::nullopt;
+    }
+    return std::nullopt;
+}
+
+class LayerMaker : public ui::ViewControllerVisitor {
+public:
+    LayerMaker(const std::shared_ptr<PeerContext>& context, const LayerSite& site)
+        : _context(context)
+        , _site(site)
+    {
+    }
+
+    void visit(ui::ViewController& screen) override { makeScreen(screen); }
+    void visit(ui::NavigationController& screen) override { makeScreen(screen); }
+    void visit(ui::AlertController& screen) override
+    {
+        const auto alert = std::static_pointer_cast<ui::AlertController>(screen.shared_from_this());
+        const auto content = [&] { return std::make_unique<AlertContent>(_context, alert); };
+        if (screen.alertStyle() == ui::AlertStyle::Alert)
+            makeOverlay(screen, content(), LayerPlace::Center);
+        else if (const auto anchor = popoverAnchor(screen))
+            makePopover(screen, content(), *anchor);
+        else
+            makeOverlay(screen, content(), isWide() ? LayerPlace::Center : LayerPlace::Bottom);
+    }
+    void visit(ui::SearchPresentation& screen) override
+    {
+        const auto search = std::static_pointer_cast<ui::SearchPresentation>(screen.shared_from_this());
+        makeOverlay(screen, std::make_unique<SearchContent>(_context, search), LayerPlace::Cover);
+    }
+
+    std::unique_ptr<PresentedLayer> layer;
+
+private:
+    bool isWide() const { return _site.size.width >= wideWindow; }
+    std::optional<GdkRectangle> popoverAnchor(const ui::ViewController& screen) const
+    {
+        return isWide() ? anchorOf(*_context, _site.canvas, screen.popoverAnchor()) : std::nullopt;
+    }
+    static std::function<void()> cancel(ui::ViewController& screen)
+    {
+        return [weak = screen.weak_from_this()] {
+            if (const auto left = weak.lock())
+                left->userCancelled();
+        };
+    }
+    void makeScreen(ui::ViewController& screen)
+    {
+        auto content = std::make_unique<ScreenContent>(_context, screen.shared_from_this());
+        const auto style = screen.presentationStyle();
+        const auto anchor = style == ui::PresentationStyle::Popover ? popoverAnchor(screen) : std::nullopt;
+        if (anchor) {
+            gtk_widget_set_size_request(content->widget(), popoverWidth, popoverHeight);
+            makePopover(screen, std::move(content), *anchor);
+            return;
+        }
+        const bool isSheet =
+            style == ui::PresentationStyle::PageSheet || style == ui::PresentationStyle::Popover;
+        makeOverlay(screen, std::move(content), isSheet && isWide() ? LayerPlace::Sheet : LayerPlace::Cover);
+    }
+    void makeOverlay(ui::ViewController& screen, std::unique_ptr<LayerContent> content, LayerPlace place)
+    {
+        layer = std::make_unique<OverlayLayer>(_site.overlay, std::move(content), place, cancel(screen));
+    }
+    void makePopover(
+        ui::ViewController& screen, std::unique_ptr<LayerContent> content, const GdkRectangle& anchor)
+    {
+        layer = std::make_unique<PopoverLayer>(_site.canvas, anchor, std::move(content), cancel(screen));
+    }
+
+    const std::shared_ptr<PeerContext>& _context;
+    const LayerSite& _site;
+};
+
+} // namespace
+
+std::unique_ptr<PresentedLayer> makeLayer(const std::shared_ptr<PeerContext>& context, const LayerSite& site,
+    const std::shared_ptr<ui::ViewController>& screen)
+{
+    LayerMaker maker(context, site);
+    screen->accept(maker);
+    return std::move(maker.layer);
+}
+
+} // namespace host::gtk

@@ -1,0 +1,84 @@
+#include "host/gtk/SearchContent.h"
+
+#include "platform/Localization.h"
+
+#include <adwaita.h>
+
+namespace host::gtk {
+
+namespace ui = platform::ui;
+
+class SearchContent::Observer : public ui::SearchObserver {
+public:
+    explicit Observer(SearchContent& content)
+        : _content(content)
+    {
+    }
+    void searchQueryWasSet(ui::SearchPresentation& search) override
+    {
+        const SignalBlock block(_content._onEdited);
+        gtk_editable_set_text(GTK_EDITABLE(_content._entry), search.query().c_str());
+        gtk_editable_set_position(GTK_EDITABLE(_content._entry), -1);
+    }
+    void searchWantsFocus(ui::SearchPresentation&, bool focus) override
+    {
+        if (focus)
+            gtk_widget_grab_focus(_content._entry);
+    }
+
+private:
+    SearchContent& _content;
+};
+
+SearchContent::SearchContent(
+    const std::shared_ptr<PeerContext>& context, const std::shared_ptr<ui::SearchPresentation>& search)
+    : _search(search)
+    , _box(ObjectRef<GtkWidget>::retain(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0)))
+    , _entry(gtk_search_entry_new())
+    , _cancel(gtk_button_new_with_label(platform::localized("Cancel").c_str()))
+    , _observer(std::make_shared<Observer>(*this))
+{
+    buildBar(*search);
+    _results = makeScreenPeer(context, search, WindowButtons::Hidden);
+    gtk_box_append(GTK_BOX(widget()), _results->widget());
+    search->setSearchObserver(_observer);
+    _observer->searchQueryWasSet(*search);
+}
+
+SearchContent::~SearchContent()
+{
+    _onEdited.disconnect();
+    _connections.clear();
+    gtk_box_remove(GTK_BOX(widget()), _results->widget());
+}
+
+void SearchContent::buildBar(const ui::SearchPresentation& search)
+{
+    auto* bar = adw_header_bar_new();
+    adw_header_bar_set_show_start_title_buttons(ADW_HEADER_BAR(bar), FALSE);
+    adw_header_bar_set_show_end_title_buttons(ADW_HEADER_BAR(bar), FALSE);
+    adw_header_bar_set_centering_policy(ADW_HEADER_BAR(bar), ADW_CENTERING_POLICY_LOOSE);
+    const auto& name = search.placeholder().empty() ? platform::localized("Search") : search.placeholder();
+    g_object_set(_entry, "placeholder-text", name.c_str(), "search-delay", 0U, "hexpand", TRUE, nullptr);
+    gtk_accessible_update_property(GTK_ACCESSIBLE(_entry), GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
+    adw_header_bar_set_title_widget(ADW_HEADER_BAR(bar), _entry);
+    adw_header_bar_pack_end(ADW_HEADER_BAR(bar), _cancel);
+    gtk_box_append(GTK_BOX(widget()), bar);
+    const auto cancel = [weak = _search] {
+        if (const auto left = weak.lock())
+            left->userCancelled();
+    };
+    _onEdited = connectSignal<void()>(_entry, "changed", [this] {
+        if (const auto edited = _search.lock())
+            edited->userEditedQuery(gtk_editable_get_text(GTK_EDITABLE(_entry)));
+    });
+    _connections.push_back(connectSignal<void()>(_entry, "stop-search", cancel));
+    _connections.push_back(connectSignal<void()>(_cancel, "clicked", cancel));
+}
+
+void SearchContent::focus()
+{
+    gtk_widget_grab_focus(_entry);
+}
+
+} // namespace host::gtk
