@@ -29,14 +29,13 @@ using Term = LayoutSolver::Term;
 
 /// The wanted length of a view on one axis as it stands in the solver.
 struct Wish {
-    double length = LayoutItem::noIntrinsicMetric;
+    double wanted = LayoutItem::noIntrinsicMetric;
     LayoutPriority hugging = 0, resistance = 0;
-    std::optional<ConstraintId> notLonger, notShorter;
+    std::optional<ConstraintId> notLonger, notShorter, notNegative;
 };
 
 struct PlacedView {
     std::weak_ptr<View> view;
-    std::array<std::optional<ConstraintId>, 2> notNegative;
     std::array<Wish, 2> wishes;
     double wrappedAt = -1; ///< the width for which the wanted height was asked last
     bool wishesAreStale = true;
@@ -55,6 +54,7 @@ struct Addition {
     LayoutRule rule;
     LayoutPriority priority;
     std::optional<ConstraintId>* id;
+    bool isHeight = false; ///< a wanted height
 };
 
 } // namespace
@@ -88,7 +88,7 @@ struct LayoutEngine::Impl {
     void placeViews();
     void removeGoneViews();
     void updateWishes(const View& view, PlacedView& entry);
-    void updateWish(LayoutSolver::Variable length, Wish& wish, const Wish& wanted);
+    void updateWish(LayoutSolver::Variable length, Wish& wish, const View& view, Axis axis);
     void setWish(std::optional<ConstraintId>& id, const Addition& addition, bool isWanted, bool isKept);
     void addAll();
     void solve();
@@ -156,7 +156,7 @@ void LayoutEngine::Impl::placeViews()
                 continue;
             // Another view has come to stand at the address of one that is gone; nothing of the old one
             // holds.
-            found->second = {view, found->second.notNegative, found->second.wishes, -1, true};
+            found->second = {view, found->second.wishes, -1, true};
             continue;
         }
         auto& entry = placed[view.get()];
@@ -164,11 +164,6 @@ void LayoutEngine::Impl::placeViews()
         const LayoutVariables own{
             solver.addVariable(), solver.addVariable(), solver.addVariable(), solver.addVariable()};
         variables[view.get()] = own;
-        const std::array lengths{own.width, own.height};
-        for (std::size_t axis = 0; axis < 2; ++axis) {
-            LayoutRule rule{{{lengths[axis], 1}}, LayoutRelation::GreaterThanOrEqual, 0};
-            additions.push_back({std::move(rule), noNegativeLength, &entry.notNegative[axis]});
-        }
     }
 }
 
@@ -223,10 +218,11 @@ void LayoutEngine::Impl::removeGoneViews()
         if (present.contains(entry.first))
             return false;
         auto& view = entry.second;
-        for (auto* id : {&view.notNegative[0], &view.notNegative[1], &view.wishes[0].notLonger,
-                 &view.wishes[0].notShorter, &view.wishes[1].notLonger, &view.wishes[1].notShorter}) {
-            if (*id)
-                solver.removeConstraint(**id);
+        for (const auto& wish : view.wishes) {
+            for (const auto& id : {wish.notLonger, wish.notShorter, wish.notNegative}) {
+                if (id)
+                    solver.removeConstraint(*id);
+            }
         }
         const auto& own = variables.at(entry.first);
         for (const auto variable : {own.x, own.y, own.width, own.height})
@@ -239,39 +235,33 @@ void LayoutEngine::Impl::removeGoneViews()
 void LayoutEngine::Impl::updateWishes(const View& view, PlacedView& entry)
 {
     const auto& own = variables.at(&view);
-    if (entry.wishesAreStale) {
+    if (std::exchange(entry.wishesAreStale, false)) {
         const Size size = view.intrinsicContentSize();
-        entry.wishesAreStale = false;
+        entry.wishes[0].wanted = size.width;
+        entry.wishes[1].wanted = size.height;
         entry.wrappedAt = -1;
-        const std::array lengths{size.width, size.height};
-        const std::array columns{own.width, own.height};
-        for (std::size_t axis = 0; axis < 2; ++axis) {
-            const Wish wanted{lengths[axis], view.hugging(static_cast<Axis>(axis)),
-                view.compressionResistance(static_cast<Axis>(axis)), {}, {}};
-            updateWish(columns[axis], entry.wishes[axis], wanted);
-        }
-        return;
     }
-    for (std::size_t axis = 0; axis < 2; ++axis) {
-        Wish wanted = entry.wishes[axis];
-        wanted.hugging = view.hugging(static_cast<Axis>(axis));
-        wanted.resistance = view.compressionResistance(static_cast<Axis>(axis));
-        updateWish(axis == 0 ? own.width : own.height, entry.wishes[axis], wanted);
-    }
+    updateWish(own.width, entry.wishes[0], view, Axis::Horizontal);
+    updateWish(own.height, entry.wishes[1], view, Axis::Vertical);
 }
 
-void LayoutEngine::Impl::updateWish(LayoutSolver::Variable length, Wish& wish, const Wish& wanted)
+void LayoutEngine::Impl::updateWish(
+    LayoutSolver::Variable length, Wish& wish, const View& view, Axis axis)
 {
-    const bool isWanted = wanted.length >= 0;
-    const LayoutRule notLonger{{{length, 1}}, LayoutRelation::LessThanOrEqual, wanted.length};
-    const LayoutRule notShorter{{{length, 1}}, LayoutRelation::GreaterThanOrEqual, wanted.length};
-    setWish(wish.notLonger, {notLonger, wanted.hugging, &wish.notLonger}, isWanted && wanted.hugging > 0,
-        wish.hugging == wanted.hugging);
-    setWish(wish.notShorter, {notShorter, wanted.resistance, &wish.notShorter},
-        isWanted && wanted.resistance > 0, wish.resistance == wanted.resistance);
-    wish.length = wanted.length;
-    wish.hugging = wanted.hugging;
-    wish.resistance = wanted.resistance;
+    const bool isWanted = wish.wanted >= 0;
+    const auto hugging = view.hugging(axis), resistance = view.compressionResistance(axis);
+    const LayoutRule notLonger{{{length, 1}}, LayoutRelation::LessThanOrEqual, wish.wanted};
+    const LayoutRule notShorter{{{length, 1}}, LayoutRelation::GreaterThanOrEqual, wish.wanted};
+    const LayoutRule notNegative{{{length, 1}}, LayoutRelation::GreaterThanOrEqual, 0};
+    const bool resists = isWanted && resistance > 0;
+    setWish(wish.notShorter, {notShorter, resistance, &wish.notShorter, axis == Axis::Vertical}, resists,
+        wish.resistance == resistance);
+    setWish(wish.notLonger, {notLonger, hugging, &wish.notLonger, axis == Axis::Vertical}, isWanted && hugging > 0,
+        wish.hugging == hugging);
+    // Of what resists being short nothing more has to be said.
+    setWish(wish.notNegative, {notNegative, noNegativeLength, &wish.notNegative}, !resists, true);
+    wish.hugging = hugging;
+    wish.resistance = resistance;
 }
 
 void LayoutEngine::Impl::setWish(
@@ -294,7 +284,9 @@ void LayoutEngine::Impl::addAll()
     static constexpr Operation op{"-[LayoutEngine addAll]"};
     // The important ones first, so that most of the others find their optimum as they come.
     std::stable_sort(additions.begin(), additions.end(),
-        [](const auto& a, const auto& b) { return a.priority > b.priority; });
+        [](const auto& a, const auto& b) {
+            return a.isHeight != b.isHeight ? a.isHeight : a.priority > b.priority;
+        });
     for (const auto& addition : additions) {
         const auto& rule = addition.rule;
         *addition.id = solver.addConstraint(rule.terms, rule.relation, rule.constant, addition.priority);
@@ -338,11 +330,11 @@ bool LayoutEngine::Impl::updateWrappedHeights()
         if (width <= 0 || std::abs(width - entry.wrappedAt) < tolerance)
             continue;
         entry.wrappedAt = width;
-        Wish wanted = entry.wishes[1];
-        wanted.length = view->intrinsicContentSize(width).height;
-        if (std::abs(wanted.length - entry.wishes[1].length) < tolerance)
+        const double height = view->intrinsicContentSize(width).height;
+        if (std::abs(height - entry.wishes[1].wanted) < tolerance)
             continue;
-        updateWish(variables.at(view.get()).height, entry.wishes[1], wanted);
+        entry.wishes[1].wanted = height;
+        updateWish(variables.at(view.get()).height, entry.wishes[1], *view, Axis::Vertical);
         isAnother = true;
     }
     addAll();

@@ -111,6 +111,8 @@ void SimplexTableau::substitute(Column column, const SparseRow& replacement)
         }
     }
     _columns[column].occurrences.clear();
+    if (kind(column) == Kind::Free)
+        return; // stands in no objective
     for (auto& [priority, level] : _levels) {
         if (const double factor = level.take(column); factor != 0)
             level.addScaled(replacement, factor, [](Column) {});
