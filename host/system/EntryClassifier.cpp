@@ -1,5 +1,7 @@
 #include "host/system/EntryClassifier.h"
 
+#include "host/system/DriveNames.h"
+
 namespace host::system {
 
 using platform::FileType;
@@ -20,8 +22,8 @@ std::string_view extensionOf(std::string_view name)
 FolderEntryKind kindOfFile(std::string_view name)
 {
     const auto extension = extensionOf(name);
-    return extension == "trwref" || extension == "trwalias" ? FolderEntryKind::Link
-                                                            : FolderEntryKind::Document;
+    return extension == referenceExtension || extension == aliasExtension ? FolderEntryKind::Link
+                                                                          : FolderEntryKind::Document;
 }
 
 } // namespace

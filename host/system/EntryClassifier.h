@@ -10,9 +10,6 @@
 
 namespace host::system {
 
-/// The promise of NAME is the hidden file ".NAME" with this suffix.
-inline constexpr std::string_view promiseSuffix = ".trwpromise";
-
 /// Tells from a name and the file system's type alone what a folder's list shows for it. Any thread.
 class EntryClassifier {
 public:

@@ -57,6 +57,18 @@ private:
     std::vector<Cursor> _cursors;
 };
 
+/// Calls for each entry that the folder itself has.
+template <typename Visit>
+void forEachEntry(const std::vector<std::shared_ptr<ListingBlock>>& blocks, const Visit& visit)
+{
+    for (const auto& block : blocks) {
+        for (std::size_t number = 0; number < block->count(); ++number) {
+            if (block->extra(number) < 0)
+                visit(block->entry(number));
+        }
+    }
+}
+
 } // namespace
 
 FolderReading::FolderReading(
@@ -140,54 +152,49 @@ void FolderReading::finishBlock(ListingBlock& block)
         merge();
 }
 
-std::unordered_set<std::string_view> FolderReading::supersededPromises() const
+std::unordered_set<std::string_view> FolderReading::promisesOfPresentItems() const
 {
-    std::unordered_set<std::string_view> promised, superseded;
-    const auto forEach = [&](const auto& visit) {
-        for (const auto& block : _blocks) {
-            for (std::size_t number = 0; number < block->count(); ++number) {
-                if (block->extra(number) < 0)
-                    visit(block->entry(number));
-            }
-        }
-    };
-    forEach([&](const platform::FolderEntry& entry) {
+    std::unordered_set<std::string_view> promised, present;
+    forEachEntry(_blocks, [&](const platform::FolderEntry& entry) {
         if (entry.isPromise)
             promised.insert(entry.name);
     });
     if (!promised.empty())
-        forEach([&](const platform::FolderEntry& entry) {
+        forEachEntry(_blocks, [&](const platform::FolderEntry& entry) {
             if (!entry.isPromise && promised.contains(entry.name))
-                superseded.insert(entry.name);
+                present.insert(entry.name);
         });
-    return superseded;
+    return present;
+}
+
+void FolderReading::appendRow(FolderSnapshot::Builder& builder, const ListingBlock& block, std::size_t number)
+{
+    if (const auto extra = block.extra(number); extra >= 0)
+        return builder.append(_extraItems[static_cast<std::size_t>(extra)]);
+    const auto entry = block.entry(number);
+    builder.append(entry.name, entry.kind, entry.isPromise);
 }
 
 void FolderReading::merge()
 {
-    std::size_t count = 0, nameBytes = 0;
+    std::size_t count = 0, nameBytes = 0, rows = 0;
     for (const auto& block : _blocks) {
         count += block->count();
         nameBytes += block->nameBytes();
     }
-    const auto superseded = supersededPromises();
+    const auto leftOut = promisesOfPresentItems();
+    const bool wantsFirstRows = count >= manyRows && !_error;
     FolderSnapshot::Builder all(_folder), first(_folder);
     all.reserve(count, nameBytes);
-    std::size_t rows = 0;
-    const auto append = [&](FolderSnapshot::Builder& builder, const ListingBlock& block, std::size_t number) {
-        if (const auto extra = block.extra(number); extra >= 0)
-            return builder.append(_extraItems[static_cast<std::size_t>(extra)]);
-        const auto entry = block.entry(number);
-        builder.append(entry.name, entry.kind, entry.isPromise);
-    };
     for (MergedBlocks merged(_blocks); !merged.isAtEnd();) {
         const auto [block, number] = merged.next();
-        if (const auto entry = block->entry(number); entry.isPromise && superseded.contains(entry.name))
+        if (const auto entry = block->entry(number); entry.isPromise && leftOut.contains(entry.name))
             continue;
-        append(all, *block, number);
-        if (++rows <= firstRows && count > manyRows)
-            append(first, *block, number);
-        if (rows == firstRows && count > manyRows && !_error)
+        appendRow(all, *block, number);
+        if (!wantsFirstRows || ++rows > firstRows)
+            continue;
+        appendRow(first, *block, number);
+        if (rows == firstRows)
             _handlers.snapshot(first.finish(ListingStage::FirstRows));
     }
     _handlers.snapshot(all.finish(_error ? ListingStage::Failed : ListingStage::Complete, _error));

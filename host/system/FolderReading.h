@@ -53,7 +53,8 @@ private:
     void finishBlock(ListingBlock& block);
     void appendExtraItems(ListingBlock& block);
     void merge();
-    std::unordered_set<std::string_view> supersededPromises() const;
+    void appendRow(platform::FolderSnapshot::Builder& builder, const ListingBlock& block, std::size_t number);
+    std::unordered_set<std::string_view> promisesOfPresentItems() const;
     void fail(int errorNumber);
 
     const std::shared_ptr<const ListingTools> _tools;

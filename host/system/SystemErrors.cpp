@@ -5,7 +5,9 @@
 
 #include <glib.h>
 
+#include <algorithm>
 #include <cerrno>
+#include <iterator>
 #include <memory>
 
 namespace host::system {
@@ -15,59 +17,48 @@ using platform::FileErrorCode;
 
 namespace {
 
-/// The sentence for an error, "%@" standing for the item's name.
+/// What to say of an error, "%@" standing for the item's name.
+struct Sentence {
+    int errorNumber;
+    const char* key;
+};
+
+constexpr Sentence sentences[] = {
+    {ENOENT, textKey("“%@” is no longer there.")},
+    {EEXIST, textKey("An item named “%@” already exists here.")},
+    {ENOTEMPTY, textKey("“%@” isn’t empty.")},
+    {ENAMETOOLONG, textKey("The name “%@” is too long.")},
+    {EILSEQ, textKey("The name “%@” can’t be used.")},
+    {EINVAL, textKey("The name “%@” can’t be used.")},
+    {EACCES, textKey("You don’t have permission to use “%@”.")},
+    {EPERM, textKey("You don’t have permission to use “%@”.")},
+    {EROFS, textKey("“%@” is in a place that can only be read.")},
+    {ENOSPC, textKey("There isn’t enough space for “%@”.")},
+    {EDQUOT, textKey("There isn’t enough space for “%@”.")},
+    {EFBIG, textKey("“%@” is too large for this storage.")},
+    {ENOTDIR, textKey("“%@” isn’t a folder.")},
+    {EISDIR, textKey("“%@” is a folder.")},
+    {ELOOP, textKey("“%@” is a link that can’t be followed.")},
+    {EXDEV, textKey("“%@” lies outside the drive or on another storage.")},
+    {EBUSY, textKey("“%@” is being used by another program.")},
+    {ETXTBSY, textKey("“%@” is being used by another program.")},
+    {EAGAIN, textKey("“%@” is being used by another program.")},
+    {EMFILE, textKey("“%@” can’t be opened because too many files are open.")},
+    {ENFILE, textKey("“%@” can’t be opened because too many files are open.")},
+    {EIO, textKey("The storage that holds “%@” failed.")},
+    {ENXIO, textKey("The storage that holds “%@” failed.")},
+    {ENODEV, textKey("The storage that holds “%@” failed.")},
+    {ETIMEDOUT, textKey("The storage that holds “%@” doesn’t answer.")},
+    {ESTALE, textKey("The storage that holds “%@” doesn’t answer.")},
+    {EHOSTDOWN, textKey("The storage that holds “%@” doesn’t answer.")},
+    {EHOSTUNREACH, textKey("The storage that holds “%@” doesn’t answer.")},
+    {EOPNOTSUPP, textKey("The storage that holds “%@” can’t do this.")},
+};
+
 std::string sentence(int errorNumber)
 {
-    switch (errorNumber) {
-    case ENOENT:
-        return translated("“%@” is no longer there.");
-    case EEXIST:
-    case ENOTEMPTY:
-        return translated("An item named “%@” already exists here.");
-    case ENAMETOOLONG:
-        return translated("The name “%@” is too long.");
-    case EILSEQ:
-    case EINVAL:
-        return translated("The name “%@” can’t be used.");
-    case EACCES:
-    case EPERM:
-        return translated("You don’t have permission to use “%@”.");
-    case EROFS:
-        return translated("“%@” is in a place that can only be read.");
-    case ENOSPC:
-    case EDQUOT:
-        return translated("There isn’t enough space for “%@”.");
-    case EFBIG:
-        return translated("“%@” is too large for this storage.");
-    case ENOTDIR:
-        return translated("“%@” isn’t a folder.");
-    case EISDIR:
-        return translated("“%@” is a folder.");
-    case ELOOP:
-        return translated("“%@” is a link that can’t be followed.");
-    case EXDEV:
-        return translated("“%@” lies outside the drive or on another storage.");
-    case EBUSY:
-    case ETXTBSY:
-    case EAGAIN:
-        return translated("“%@” is being used by another program.");
-    case EMFILE:
-    case ENFILE:
-        return translated("“%@” can’t be opened because too many files are open.");
-    case EIO:
-    case ENXIO:
-    case ENODEV:
-        return translated("The storage that holds “%@” failed.");
-    case ETIMEDOUT:
-    case ESTALE:
-    case EHOSTDOWN:
-    case EHOSTUNREACH:
-        return translated("The storage that holds “%@” doesn’t answer.");
-    case EOPNOTSUPP:
-        return translated("The storage that holds “%@” can’t do this.");
-    default:
-        return translated("“%@” can’t be used.");
-    }
+    const auto* found = std::ranges::find(sentences, errorNumber, &Sentence::errorNumber);
+    return translated(found != std::end(sentences) ? found->key : textKey("“%@” can’t be used."));
 }
 
 std::optional<FileErrorCode> fileErrorCode(int errorNumber)

@@ -1,5 +1,7 @@
 #include "host/system/TypeTable.h"
 
+#include "host/system/DriveNames.h"
+
 namespace host::system {
 
 namespace {
@@ -15,8 +17,8 @@ constexpr TypeRow rows[] = {
     {"public.package", "public.directory", "", ""},
     {"public.bundle", "public.package", "", "bundle plugin framework"},
     {"public.symlink", "public.item", "inode/symlink", ""},
-    {"app.tarrow.Drive.alias", "public.data", "", "trwalias"},
-    {"app.tarrow.Drive.reference", "public.data", "", "trwref"},
+    {aliasType, "public.data", "", aliasExtension},
+    {"app.tarrow.Drive.reference", "public.data", "", referenceExtension},
     {"public.composite-content", "public.content", "", ""},
     {"public.executable", "public.data", "application/x-executable application/x-sharedlib", "exe so"},
     {"public.archive", "public.data", "", ""},
