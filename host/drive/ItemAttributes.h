@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/drive/ItemFacts.h"
+#include "host/system/DriveNames.h"
 #include "platform/DocumentContainers.h"
 #include "platform/Localization.h"
 #include "platform/TypeRegistry.h"
@@ -13,8 +14,8 @@ namespace host::drive {
 class ItemAttributes {
 public:
     /// Extension of alias files; their kind is called "Alias" in every language.
-    static constexpr std::string_view aliasExtension = "trwalias";
-    static constexpr std::string_view aliasType = "app.tarrow.Drive.alias";
+    static constexpr std::string_view aliasExtension = system::aliasExtension;
+    static constexpr std::string_view aliasType = system::aliasType;
 
     /// `localization` may be null: then no name is translated.
     ItemAttributes(std::shared_ptr<const platform::TypeRegistry> types,

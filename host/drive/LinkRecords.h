@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/drive/DriveLayout.h"
+#include "host/system/DriveNames.h"
 #include "platform/Error.h"
 #include "platform/Url.h"
 
@@ -9,8 +10,7 @@
 
 namespace host::drive {
 
-/// Extension of a reference: a small file that stands for a document of a container.
-inline constexpr std::string_view referenceExtension = "trwref";
+using system::referenceExtension;
 
 /// Largest reference or alias that is read, in bytes.
 inline constexpr std::size_t maximumLinkRecordSize = 64 * 1024;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/system/DriveNames.h"
 #include "platform/Attributes.h"
 #include "platform/Error.h"
 
@@ -15,7 +16,7 @@ namespace host::drive {
 struct PromiseRecord {
     /// Largest promise that is read, in bytes.
     static constexpr std::size_t maximumFileSize = 64 * 1024;
-    static constexpr std::string_view suffix = ".trwpromise";
+    static constexpr std::string_view suffix = system::promiseSuffix;
 
     enum class Kind : std::uint8_t { File, Directory, Package };
 
