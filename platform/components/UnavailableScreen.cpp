@@ -21,7 +21,7 @@ void UnavailableScreen::loadView()
     placeholder->setContent({
         .iconName = "avatar-default-symbolic",
         .title = localized("You are not signed in"),
-        .message = localized("Sign in to your drive’s account in the system settings. Your folders and "
+        .message = localized("Sign in to your drive’s account. Your folders and "
                              "documents appear here as soon as you are signed in."),
     });
     setView(placeholder);
