@@ -59,7 +59,7 @@ std::vector<Url> DocumentListController::selectedItems() const
     if (selectedItemCount() == 0)
         return items;
     const auto& rows = *_contents->rows();
-    for (std::size_t row = 0; row < rows.count(); ++row) {
+    for (std::size_t row = 0; row < rows.count() && items.size() < selectedItemCount(); ++row) {
         if (_listView->selection().contains(rows.ids()[row]))
             items.push_back(rows.url(row));
     }
