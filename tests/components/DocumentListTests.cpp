@@ -2,7 +2,7 @@
 
 #include "host/drive/ContainerRecord.h"
 #include "host/drive/ItemFacts.h"
-#include "platform/components/DocumentSearch.h"
+#include "platform/Localization.h"
 #include "platform/components/PlaceholderView.h"
 #include "platform/components/UnavailableScreen.h"
 #include "platform/ui/ListView.h"
@@ -62,7 +62,7 @@ Url makePaintLibrary(const testing_support::DriveFixture& drive)
 
 struct RowOfKind {
     HandLister::Entry entry;
-    const char* detail; ///< the end of the second line
+    std::string detail; ///< the end of the second line
     ui::DownloadState download = ui::DownloadState::Present;
     ui::RowAccessory accessory = ui::RowAccessory::None;
     std::size_t dots = 0;
@@ -83,7 +83,8 @@ TEST_F(DocumentList, ShowsEveryKindOfItemWithItsDetails)
     drive.makeFolder("Stuff/Letter.pages");
     drive.writeDocument("Stuff/bad\xFFname");
     const RowOfKind rows[] = {
-        {{"Trip", Kind::Folder}, "2 items", ui::DownloadState::Present, ui::RowAccessory::Disclosure},
+        {{"Trip", Kind::Folder}, localizedPlural(".DICT.ITEMS.%d", {2}), ui::DownloadState::Present,
+            ui::RowAccessory::Disclosure},
         {{"bad\xFFname"}, "7 bytes"},
         {{"Far.pdf", Kind::Document, true}, "2 MB", ui::DownloadState::InCloud, ui::RowAccessory::None, 2},
         {{"Letter.pages", Kind::Package}, ""},
@@ -353,6 +354,41 @@ TEST_F(DocumentList, SearchesTheNamesOfItsItems)
     search->userEditedQuery("");
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(results->rowCount(), 0U);
+}
+
+TEST_F(DocumentList, FollowsTheFolderOnDisk)
+{
+    useRealLister();
+    drive.writeDocument("Stuff/b.txt");
+    drive.writeDocument("Stuff/a10.txt");
+    drive.writeDocument("Stuff/a9.txt");
+    drive.makeFolder("Stuff/Trip");
+    drive.writePromise("Stuff/far.txt", {});
+    const auto list = shownList(drive.url("Stuff"));
+    ASSERT_TRUE(waitUntil([&] { return list->containedItemCount() == 5; }));
+    EXPECT_EQ(titles(list), (Lines{"Trip", "a9.txt", "a10.txt", "b.txt", "far.txt"}));
+
+    list->setEditingAnimated(true, false);
+    list->setSelectedItems({drive.url("Stuff/b.txt")});
+    drive.writeDocument("Stuff/a11.txt");
+    std::filesystem::remove(drive.url("Stuff/a9.txt").path());
+    ASSERT_TRUE(waitUntil([&] { return titles(list).at(2) == "a11.txt"; }));
+    EXPECT_EQ(list->selectedItems(), std::vector{drive.url("Stuff/b.txt")});
+
+    delegate->take();
+    std::filesystem::remove_all(drive.url("Stuff").path());
+    ASSERT_TRUE(waitUntil([&] { return list->containedItemCount() == 0; }));
+    drive.dispatch->runUntilIdle();
+    EXPECT_THAT(delegate->take(), testing::Contains("removed Stuff"));
+}
+
+TEST_F(DocumentList, SaysWhyAFolderOnDiskCannotBeRead)
+{
+    useRealLister();
+    const auto list = shownList(drive.writeDocument("Stuff", "no folder"));
+    ASSERT_TRUE(waitUntil([&] { return !list->placeholder()->content().title.empty(); }));
+    EXPECT_EQ(list->placeholder()->content().title, "This folder cannot be shown");
+    EXPECT_FALSE(list->placeholder()->content().message.empty());
 }
 
 struct ListWithoutSearch : DocumentListController {

@@ -1,12 +1,10 @@
 #include "tests/components/support/ComponentsFixture.h"
 
-#include "host/system/GdkPixbufImageLoader.h"
-#include "host/system/GettextLocalization.h"
-#include "host/system/IcuFormatters.h"
-#include "host/system/TypePreviewSupport.h"
-#include "host/system/UserLocale.h"
+#include "host/system/MimeTypeRegistry.h"
+#include "host/system/ThreadedFolderLister.h"
 #include "platform/ui/ListView.h"
 
+#include <chrono>
 #include <utility>
 
 namespace testing_support {
@@ -73,22 +71,39 @@ std::vector<std::string> RecordingListDelegate::take()
 ComponentsFixture::ComponentsFixture()
 {
     coordinator = std::make_shared<CountingCoordinator>(_driveServices.fileCoordinator());
-    platform::ServiceSet set;
-    set.cloudDocumentService = drive.cloud;
-    set.dispatch = drive.dispatch;
-    set.fileCoordinator = coordinator;
-    set.fileSystem = borrowed(_driveServices.fileSystem());
-    set.folderLister = lister;
-    set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
-    set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
-    set.linkOpener = links;
-    set.localization = std::make_shared<host::system::GettextLocalization>(
-        TRW_LOCALE_FOLDER, host::system::UserLocale{"en", "en_US"});
-    set.notificationCenter = drive.notifications;
-    set.storageOfferManager = borrowed(_driveServices.storageOfferManager());
-    set.typeRegistry = borrowed(_driveServices.typeRegistry());
-    set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(set.typeRegistry);
-    platform::installServices(std::move(set));
+    _set.cloudDocumentService = drive.cloud;
+    _set.dispatch = drive.dispatch;
+    _set.fileCoordinator = coordinator;
+    _set.fileSystem = borrowed(_driveServices.fileSystem());
+    _set.folderLister = lister;
+    _set.formatters = borrowed(_driveServices.formatters());
+    _set.imageLoader = borrowed(_driveServices.imageLoader());
+    _set.linkOpener = links;
+    _set.localization = borrowed(_driveServices.localization());
+    _set.notificationCenter = drive.notifications;
+    _set.previewSupport = borrowed(_driveServices.previewSupport());
+    _set.storageOfferManager = borrowed(_driveServices.storageOfferManager());
+    _set.typeRegistry = borrowed(_driveServices.typeRegistry());
+    platform::installServices(_set);
+}
+
+void ComponentsFixture::useRealLister()
+{
+    static const auto types = std::make_shared<const host::system::MimeTypeRegistry>();
+    _set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(drive.dispatch, types, "en_US");
+    platform::installServices(_set);
+}
+
+bool ComponentsFixture::waitUntil(const std::function<bool()>& condition)
+{
+    const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(60);
+    while (!condition()) {
+        if (std::chrono::steady_clock::now() > deadline)
+            return false;
+        drive.settle();
+        drive.dispatch->advance(0.01);
+    }
+    return true;
 }
 
 ComponentsFixture::List ComponentsFixture::shownList(const Url& folder)

@@ -10,6 +10,7 @@
 
 #include <gtest/gtest.h>
 
+#include <functional>
 #include <memory>
 #include <string>
 #include <vector>
@@ -61,7 +62,8 @@ private:
     std::vector<std::string> _lines;
 };
 
-/// The platform's screens on a real drive in a temporary folder; the listings alone come from the test.
+/// The platform's screens on a real drive in a temporary folder; the listings alone come
+/// from the test, unless it asks for the real ones.
 class ComponentsFixture : public testing::Test {
 protected:
     using List = std::shared_ptr<platform::components::DocumentListController>;
@@ -74,6 +76,12 @@ protected:
         platform::ListingStage stage = platform::ListingStage::Complete);
     std::vector<std::string> titles(const List& list) const;
 
+    /// Lists from now on come from the disk, and follow it.
+    void useRealLister();
+    /// Lets the kernel's notices and the virtual clock run until the condition holds; false when it never
+    /// does.
+    bool waitUntil(const std::function<bool()>& condition);
+
     DriveFixture drive;
     std::shared_ptr<HandLister> lister = std::make_shared<HandLister>();
     std::shared_ptr<RecordingLinks> links = std::make_shared<RecordingLinks>();
@@ -82,6 +90,7 @@ protected:
 
 private:
     platform::Services _driveServices = platform::services();
+    platform::ServiceSet _set;
 };
 
 } // namespace testing_support
