@@ -19,6 +19,7 @@
 
 #include <benchmark/benchmark.h>
 
+#include <algorithm>
 #include <array>
 #include <chrono>
 #include <filesystem>
@@ -29,7 +30,7 @@ namespace {
 using host::drive::PromiseRecord;
 using platform::Url;
 
-constexpr int itemCount = 256;
+constexpr int itemCount = 64;
 
 /// A drive with local files and promises, and the services that a record asks.
 class Drive {
@@ -109,15 +110,21 @@ void floorOfPromise(const std::string& path)
 
 using Clock = std::chrono::steady_clock;
 
-double nanoseconds(Clock::duration time)
+double median(std::vector<double>& times)
 {
-    return std::chrono::duration<double, std::nano>(time).count();
+    const auto middle = times.begin() + static_cast<std::ptrdiff_t>(times.size() / 2);
+    std::ranges::nth_element(times, middle);
+    return *middle;
 }
 
-/// Runs floor and reading in turn over all items, so that both meet the same machine.
+/// Runs floor and reading in turn over all items, so that both meet the same machine, and compares the
+/// medians.
 void compare(benchmark::State& state, const std::vector<Url>& urls, void (*floor)(const std::string&))
 {
-    double floorTime = 0, readTime = 0;
+    std::vector<double> floorTimes, readTimes;
+    const auto nanosecondsForEach = [&](Clock::duration time) {
+        return std::chrono::duration<double, std::nano>(time).count() / static_cast<double>(urls.size());
+    };
     for (auto _ : state) {
         const auto begin = Clock::now();
         for (const auto& url : urls)
@@ -126,14 +133,13 @@ void compare(benchmark::State& state, const std::vector<Url>& urls, void (*floor
         for (const auto& url : urls)
             benchmark::DoNotOptimize(tarrow::DRItem::initWithURL(url));
         const auto end = Clock::now();
-        floorTime += nanoseconds(middle - begin);
-        readTime += nanoseconds(end - middle);
-        state.SetIterationTime(nanoseconds(end - middle) / 1e9);
+        floorTimes.push_back(nanosecondsForEach(middle - begin));
+        readTimes.push_back(nanosecondsForEach(end - middle));
+        state.SetIterationTime(std::chrono::duration<double>(end - middle).count());
     }
-    const auto items = static_cast<double>(state.iterations()) * static_cast<double>(urls.size());
-    state.counters["floor_ns"] = floorTime / items;
-    state.counters["record_ns"] = readTime / items;
-    state.counters["ratio"] = readTime / floorTime;
+    state.counters["floor_ns"] = median(floorTimes);
+    state.counters["record_ns"] = median(readTimes);
+    state.counters["ratio"] = median(readTimes) / median(floorTimes);
 }
 
 void recordOfLocalFile(benchmark::State& state)

@@ -5,10 +5,13 @@
 #include "platform/Url.h"
 
 #include <array>
+#include <concepts>
 #include <cstdint>
 #include <optional>
 #include <span>
 #include <string>
+#include <type_traits>
+#include <utility>
 #include <variant>
 #include <vector>
 
@@ -59,6 +62,12 @@ using AttributeValue = std::variant<std::monostate, bool, std::uint64_t, std::st
 class AttributeMap {
 public:
     void set(AttributeKey key, AttributeValue value) { _values[index(key)] = std::move(value); }
+    /// The same for a value of one of the kinds, which is made in its place.
+    template <typename T>
+    requires(!std::same_as<std::remove_cvref_t<T>, AttributeValue>) void set(AttributeKey key, T&& value)
+    {
+        _values[index(key)] = std::forward<T>(value);
+    }
 
     bool has(AttributeKey key) const { return !std::holds_alternative<std::monostate>(_values[index(key)]); }
     const AttributeValue& value(AttributeKey key) const { return _values[index(key)]; }

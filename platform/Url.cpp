@@ -130,9 +130,14 @@ std::optional<Url> Url::parse(std::string_view text)
 
 Url Url::fileURL(std::string_view path, PathKind kind)
 {
+    return fromCleanPath(withoutExtraSlashes(path), kind);
+}
+
+Url Url::fromCleanPath(std::string path, PathKind kind)
+{
     auto data = std::make_shared<Data>();
     data->scheme = "file";
-    data->path = withoutExtraSlashes(path);
+    data->path = std::move(path);
     data->kind = kind;
     return Url(std::move(data));
 }
@@ -171,10 +176,9 @@ std::string Url::pathExtension() const
 
 Url Url::deletingLastPathComponent() const
 {
-    const std::string_view whole = path();
-    const auto slash = whole.rfind('/');
-    return fileURL(
-        slash == 0 || slash == std::string_view::npos ? "/" : whole.substr(0, slash), PathKind::Directory);
+    const auto slash = path().rfind('/');
+    return fromCleanPath(
+        slash == 0 || slash == std::string::npos ? "/" : path().substr(0, slash), PathKind::Directory);
 }
 
 Url Url::appendingPathComponent(std::string_view name, PathKind kind) const

@@ -77,6 +77,7 @@ private:
         std::vector<QueryItem> query;
         std::string text;
     };
+    static Url fromCleanPath(std::string path, PathKind kind);
     explicit Url(std::shared_ptr<const Data> data)
         : _data(std::move(data))
     {

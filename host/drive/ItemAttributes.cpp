@@ -112,14 +112,12 @@ ItemAttributes::ItemAttributes(std::shared_ptr<const platform::TypeRegistry> typ
 {
 }
 
-AttributeMap ItemAttributes::values(
-    const Url& url, const ItemFacts& facts, platform::AttributeKeys keys) const
+void ItemAttributes::fill(
+    AttributeMap& map, const Url& url, const ItemFacts& facts, platform::AttributeKeys keys) const
 {
     const auto itemKind = kind(url, facts);
-    AttributeMap map;
     for (const auto key : keys)
         set(map, key, url, facts, itemKind);
-    return map;
 }
 
 ItemAttributes::Kind ItemAttributes::kind(const Url& url, const ItemFacts& facts) const
@@ -191,14 +189,18 @@ void ItemAttributes::set(
     case AttributeKey::TypeIdentifier:
         return map.set(key, kind.type);
     case AttributeKey::LocalizedTypeDescription:
-        return map.set(key, valueOf(description(kind.type)));
+        if (auto text = description(kind.type))
+            map.set(key, std::move(*text));
+        return;
     case AttributeKey::FileSize:
     case AttributeKey::TotalFileSize:
         return map.set(key, fileSize(facts));
     case AttributeKey::CreationDate:
         return map.set(key, creationDate(facts));
     case AttributeKey::ContentModificationDate:
-        return map.set(key, valueOf(facts.modified()));
+        if (const auto modified = facts.modified())
+            map.set(key, *modified);
+        return;
     case AttributeKey::IsDirectory:
         return map.set(key, kind.isDirectory);
     case AttributeKey::IsRegularFile:

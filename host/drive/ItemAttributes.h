@@ -22,10 +22,10 @@ public:
         std::shared_ptr<const platform::DocumentContainers> containers,
         std::shared_ptr<const platform::Localization> localization, platform::Url defaultContainer);
 
-    /// The values of the keys for an item that is here or promised. A key that the item has no value for is
-    /// left out; so is the thumbnail map.
-    platform::AttributeMap values(
-        const platform::Url& url, const ItemFacts& facts, platform::AttributeKeys keys) const;
+    /// Puts the values of the keys into a map, for an item that is here or promised. A key that the item has
+    /// no value for is left out; so is the thumbnail map.
+    void fill(platform::AttributeMap& map, const platform::Url& url, const ItemFacts& facts,
+        platform::AttributeKeys keys) const;
 
     /// Whether a picture is here, judged by its name.
     bool isPicture(const platform::Url& url, const ItemFacts& facts) const;

@@ -54,11 +54,15 @@ platform::ItemReading LocalPromisedItems::readItem(const Url& url, platform::Att
     if (facts.presence == ItemFacts::Presence::Missing)
         return {facts.error, {}, url, {}};
     const bool isPromised = facts.presence == ItemFacts::Presence::Promised;
-    auto physical = isPromised ? Url::fileURL(PromiseRecord::pathFor(url.path())) : url;
-    if (facts.error)
-        return {std::nullopt, *facts.error, std::move(physical), {}};
-    return {std::nullopt, values(url, facts, keys), std::move(physical),
-        isPromised ? facts.promise.tags : facts.marks.tags};
+    platform::ItemReading reading{
+        {}, {}, isPromised ? Url::fileURL(PromiseRecord::pathFor(url.path())) : url, {}};
+    if (facts.error) {
+        reading.values.error = facts.error;
+        return reading;
+    }
+    fill(reading.values.value.emplace(), url, facts, keys);
+    reading.tagNames = isPromised ? facts.promise.tags : facts.marks.tags;
+    return reading;
 }
 
 Result<AttributeMap> LocalPromisedItems::resourceValues(const Url& url, platform::AttributeKeys keys) const
@@ -70,17 +74,24 @@ Result<AttributeMap> LocalPromisedItems::resourceValues(const Url& url, platform
 AttributeMap LocalPromisedItems::values(
     const Url& url, const ItemFacts& facts, platform::AttributeKeys keys) const
 {
-    auto map = _attributes.values(url, facts, keys);
+    AttributeMap map;
+    fill(map, url, facts, keys);
+    return map;
+}
+
+void LocalPromisedItems::fill(
+    AttributeMap& map, const Url& url, const ItemFacts& facts, platform::AttributeKeys keys) const
+{
+    _attributes.fill(map, url, facts, keys);
     if (std::ranges::find(keys, AttributeKey::ThumbnailMap) == keys.end())
-        return map;
+        return;
     const auto modified = facts.modified();
     if (!modified)
-        return map;
+        return;
     const auto ifMissing = _attributes.isPicture(url, facts) ? ThumbnailCache::IfMissing::MakeFromPicture
                                                              : ThumbnailCache::IfMissing::Nothing;
     if (auto thumbnails = _thumbnails->thumbnails(url, *modified, ifMissing); !thumbnails.empty())
         map.set(AttributeKey::ThumbnailMap, std::move(thumbnails));
-    return map;
 }
 
 Url LocalPromisedItems::physicalURLForPromise(const Url& url) const

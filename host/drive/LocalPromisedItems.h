@@ -35,6 +35,8 @@ public:
 private:
     platform::AttributeMap values(
         const platform::Url& url, const ItemFacts& facts, platform::AttributeKeys keys) const;
+    void fill(platform::AttributeMap& map, const platform::Url& url, const ItemFacts& facts,
+        platform::AttributeKeys keys) const;
 
     DriveLayout _layout;
     ItemAttributes _attributes;

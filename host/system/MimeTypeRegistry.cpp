@@ -16,7 +16,7 @@ namespace {
 // No extension in use is longer, and longer ones need no place in memory.
 constexpr std::size_t maximumExtension = 32;
 // Names that a program makes up must not fill the memory.
-constexpr std::size_t maximumCachedExtensions = 4096;
+constexpr std::size_t maximumCachedAnswers = 4096;
 
 using GlibText = std::unique_ptr<char, decltype(&g_free)>;
 
@@ -40,36 +40,37 @@ private:
 
 } // namespace
 
-/// The types of extensions that were asked for, unknown ones included.
-class MimeTypeRegistry::ExtensionCache {
+/// What was answered to the texts that were asked for, unknown ones included.
+class MimeTypeRegistry::AnswerCache {
 public:
     using Answer = std::optional<std::string>;
 
-    /// Whether the extension was asked for before; `type` is then what the answer was.
-    bool find(std::string_view extension, Answer& type) const
+    /// Whether the text was asked for before; `answer` is then what the answer was.
+    bool find(std::string_view text, Answer& answer) const
     {
         const std::shared_lock lock(_mutex);
-        const auto found = _types.find(extension);
-        if (found == _types.end())
+        const auto found = _answers.find(text);
+        if (found == _answers.end())
             return false;
-        type = found->second;
+        answer = found->second;
         return true;
     }
-    void add(std::string_view extension, const Answer& type)
+    void add(std::string_view text, const Answer& answer)
     {
         const std::lock_guard lock(_mutex);
-        if (_types.size() < maximumCachedExtensions)
-            _types.emplace(extension, type);
+        if (_answers.size() < maximumCachedAnswers)
+            _answers.emplace(text, answer);
     }
 
 private:
     mutable std::shared_mutex _mutex;
-    TextMap<Answer> _types;
+    TextMap<Answer> _answers;
 };
 
 MimeTypeRegistry::MimeTypeRegistry()
     : _graph(std::make_unique<TypeGraph>())
-    , _extensions(std::make_unique<ExtensionCache>())
+    , _extensions(std::make_unique<AnswerCache>())
+    , _descriptions(std::make_unique<AnswerCache>())
 {
 }
 
@@ -125,11 +126,15 @@ std::optional<std::string> MimeTypeRegistry::mimeType(std::string_view type) con
 
 std::optional<std::string> MimeTypeRegistry::description(std::string_view type) const
 {
+    std::optional<std::string> description;
+    if (_descriptions->find(type, description))
+        return description;
     const auto mime = mimeType(type);
-    if (!mime)
-        return std::nullopt;
-    const GlibText text(g_content_type_get_description(mime->c_str()), g_free);
-    return text ? std::optional<std::string>(text.get()) : std::nullopt;
+    const GlibText text(mime ? g_content_type_get_description(mime->c_str()) : nullptr, g_free);
+    if (text)
+        description = text.get();
+    _descriptions->add(type, description);
+    return description;
 }
 
 std::string MimeTypeRegistry::iconName(std::string_view type) const

@@ -31,9 +31,9 @@ public:
     std::string typeForMimeType(std::string_view mimeType) const;
 
 private:
-    class ExtensionCache;
+    class AnswerCache;
     std::unique_ptr<TypeGraph> _graph;
-    std::unique_ptr<ExtensionCache> _extensions;
+    std::unique_ptr<AnswerCache> _extensions, _descriptions;
 };
 
 } // namespace host::system
