@@ -24,8 +24,8 @@ PromisedItems& promisedItems()
 /// Whether a name of a folder stands for an item that its list shows.
 bool isListed(const std::filesystem::path& path)
 {
-    const auto& name = path.filename().native();
-    return !name.starts_with('.') || promisedItems().isItemPromise(Url::fileURL(path.native()));
+    const auto name = path.filename();
+    return !name.native().starts_with('.') || promisedItems().isItemPromise(Url::fileURL(path.native()));
 }
 
 std::optional<std::int64_t> numberOfItems(const Url& folder)
