@@ -2,14 +2,15 @@
 
 #include "host/system/GettextLocalization.h"
 #include "host/system/IcuFormatters.h"
+#include "host/system/MimeTypeRegistry.h"
+#include "host/system/ThreadedFolderLister.h"
+#include "host/system/TypePreviewSupport.h"
 #include "host/system/UserLocale.h"
 #include "platform/Localization.h"
-#include "platform/PreviewSupport.h"
 #include "platform/components/DocumentListController.h"
 #include "platform/ui/AlertController.h"
 #include "platform/ui/Window.h"
 #include "preview/LookwellItemController.h"
-#include "tests/browser/support/PlainFolderLister.h"
 
 namespace testing_support {
 
@@ -17,12 +18,6 @@ using platform::components::DocumentListController;
 using platform::ui::Window;
 
 namespace {
-
-/// Everything but archives can be previewed.
-class NoArchives : public platform::PreviewSupport {
-public:
-    bool canPreview(const platform::Url& url) const override { return url.pathExtension() != "zip"; }
-};
 
 std::shared_ptr<platform::Localization> englishTexts()
 {
@@ -42,19 +37,20 @@ std::shared_ptr<T> borrowed(T& service)
 BrowserFixture::BrowserFixture()
 {
     cloud = std::make_shared<SimulatedCloud>(drive.cloud);
+    const auto types = std::make_shared<host::system::MimeTypeRegistry>();
     platform::ServiceSet set;
     set.cloudDocumentService = cloud;
     set.dispatch = drive.dispatch;
     set.fileCoordinator = borrowed(_driveServices.fileCoordinator());
     set.fileSystem = borrowed(_driveServices.fileSystem());
-    set.folderLister = std::make_shared<PlainFolderLister>(drive.dispatch);
+    set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(drive.dispatch, types, "en_US");
     set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
     set.keyedArchiver = borrowed(_driveServices.keyedArchiver());
     set.localization = englishTexts();
     set.notificationCenter = drive.notifications;
-    set.previewSupport = std::make_shared<NoArchives>();
+    set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(types);
     set.storageOfferManager = offers;
-    set.typeRegistry = borrowed(_driveServices.typeRegistry());
+    set.typeRegistry = types;
     set.userDefaults = borrowed(_driveServices.userDefaults());
     platform::installServices(std::move(set));
 }
