@@ -7,7 +7,7 @@
 #include <algorithm>
 #include <string>
 
-extern "C" GResource* trw_resources_get_resource();
+extern "C" void trw_resources_register_resource();
 
 namespace host::gtk {
 
@@ -54,7 +54,7 @@ void installResources()
     if (isInstalled || !display)
         return;
     isInstalled = true;
-    g_resources_register(trw_resources_get_resource());
+    trw_resources_register_resource();
     gtk_icon_theme_add_resource_path(gtk_icon_theme_get_for_display(display), "/app/tarrow/Drive/icons");
     const auto provider = ObjectRef<GtkCssProvider>::adopt(gtk_css_provider_new());
     gtk_css_provider_load_from_resource(provider.get(), "/app/tarrow/Drive/kit.css");

@@ -1,0 +1,113 @@
+#include "app/AppDelegate.h"
+#include "host/drive/LocalCloudDocumentService.h"
+#include "host/gtk/GtkApplicationLoop.h"
+#include "host/system/GLibDispatch.h"
+#include "host/system/GdkPixbufImageLoader.h"
+#include "host/system/GettextLocalization.h"
+#include "host/system/GioLinkOpener.h"
+#include "host/system/IcuFormatters.h"
+#include "host/system/JournalLogSink.h"
+#include "host/system/JsonKeyedArchiver.h"
+#include "host/system/JsonUserDefaults.h"
+#include "host/system/LocalFileCoordinator.h"
+#include "host/system/MimeTypeRegistry.h"
+#include "host/system/PosixFileSystem.h"
+#include "host/system/ThreadedFolderLister.h"
+#include "host/system/TypePreviewSupport.h"
+#include "host/system/UnicodeCharacterData.h"
+#include "host/system/UserLocale.h"
+#include "items/FileUtils.h"
+#include "platform/Log.h"
+#include "platform/NotificationCenter.h"
+#include "platform/Services.h"
+
+#include <filesystem>
+#include <memory>
+#include <string>
+#include <system_error>
+
+namespace {
+
+using host::drive::DriveLayout;
+using host::drive::LocalCloudDocumentService;
+using platform::ServiceSet;
+
+/// The program's own file, also when it was started by its bare name.
+std::string executablePath(const char* firstArgument)
+{
+    std::error_code problem;
+    const auto path = std::filesystem::read_symlink("/proc/self/exe", problem);
+    return problem ? std::string(firstArgument ? firstArgument : "") : path.string();
+}
+
+/// The catalogues beside the program in the build tree, else where they are installed.
+std::string localeFolder(const std::filesystem::path& executable)
+{
+    const auto built = executable.parent_path() / "po" / "locale";
+    std::error_code problem;
+    return std::filesystem::exists(built, problem) ? built
+                                                   : executable.parent_path().parent_path() / "share/locale";
+}
+
+/// What needs nothing of the drive.
+ServiceSet systemServices(const std::string& executable)
+{
+    const auto locale = host::system::UserLocale::fromEnvironment();
+    ServiceSet set;
+    set.localization = std::make_shared<host::system::GettextLocalization>(localeFolder(executable), locale);
+    set.formatters = std::make_shared<host::system::IcuFormatters>(locale.formats);
+    set.characterData = std::make_shared<host::system::UnicodeCharacterData>();
+    set.dispatch = std::make_shared<host::system::GLibDispatch>();
+    set.notificationCenter = std::make_shared<platform::NotificationCenter>();
+    set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
+    set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>();
+    const auto types = std::make_shared<host::system::MimeTypeRegistry>();
+    set.typeRegistry = types;
+    set.folderLister =
+        std::make_shared<host::system::ThreadedFolderLister>(set.dispatch, types, locale.formats);
+    set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(types);
+    set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
+    set.linkOpener = std::make_shared<host::system::GioLinkOpener>();
+    set.keyedArchiver = std::make_shared<host::system::JsonKeyedArchiver>();
+    return set;
+}
+
+/// Adds what stands on the drive's folder; answers where the drive lies.
+DriveLayout addDriveServices(ServiceSet& set)
+{
+    const auto cloud = LocalCloudDocumentService::create(DriveLayout::fromEnvironment(),
+        {set.dispatch, set.notificationCenter, set.typeRegistry, set.localization, set.linkOpener});
+    set.cloudDocumentService = cloud;
+    set.storageOfferManager = cloud->storageOffers();
+    set.userDefaults =
+        std::make_shared<host::system::JsonUserDefaults>(cloud->layout().defaults(), *set.dispatch);
+    return cloud->layout();
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    static constexpr platform::Operation op{"main"};
+    host::system::installSystemLog();
+    const auto executable = executablePath(argc > 0 ? argv[0] : nullptr);
+    op.debug("-------------------------------------------------------");
+    op.info("Running %s", executable);
+    op.info("Built (main) on " __DATE__ " @ " __TIME__);
+
+    auto set = systemServices(executable);
+    const auto layout = addDriveServices(set);
+    // The queues end last: everything else may still hand them work while it ends.
+    const auto dispatch = set.dispatch;
+    platform::installServices(std::move(set));
+    tarrow::FileUtils::logFileAttributes(executable);
+
+    int status = 0;
+    {
+        host::gtk::GtkApplicationLoop application(
+            {.version = TRW_VERSION, .stateFile = layout.interfaceState()});
+        status = application.run(argc, argv, [] { return std::make_shared<tarrow::AppDelegate>(); });
+    }
+    platform::installServices({});
+    return status;
+}
