@@ -2,6 +2,8 @@
 
 #include <glib.h>
 
+#include <algorithm>
+
 namespace host::drive {
 
 namespace {
@@ -93,7 +95,8 @@ std::string_view extensionOf(const std::string& path)
 // Bytes that are no text become the replacement character; only what is shown is changed.
 std::string displayable(std::string name)
 {
-    if (platform::isValidUtf8(name))
+    const bool isAscii = std::ranges::all_of(name, [](char c) { return static_cast<signed char>(c) >= 0; });
+    if (isAscii || platform::isValidUtf8(name))
         return name;
     const std::unique_ptr<char, decltype(&g_free)> valid(
         g_utf8_make_valid(name.data(), static_cast<gssize>(name.size())), &g_free);
@@ -115,9 +118,15 @@ ItemAttributes::ItemAttributes(std::shared_ptr<const platform::TypeRegistry> typ
 void ItemAttributes::fill(
     AttributeMap& map, const Url& url, const ItemFacts& facts, platform::AttributeKeys keys) const
 {
-    const auto itemKind = kind(url, facts);
-    for (const auto key : keys)
+    auto itemKind = kind(url, facts);
+    bool wantsType = false;
+    for (const auto key : keys) {
+        wantsType = wantsType || key == AttributeKey::TypeIdentifier;
         set(map, key, url, facts, itemKind);
+    }
+    // Last, because then the text can be handed over rather than copied.
+    if (wantsType)
+        map.set(AttributeKey::TypeIdentifier, std::move(itemKind.type));
 }
 
 ItemAttributes::Kind ItemAttributes::kind(const Url& url, const ItemFacts& facts) const
@@ -186,8 +195,6 @@ void ItemAttributes::set(
         return map.set(key, url.lastPathComponent());
     case AttributeKey::LocalizedName:
         return map.set(key, localizedName(url, facts));
-    case AttributeKey::TypeIdentifier:
-        return map.set(key, kind.type);
     case AttributeKey::LocalizedTypeDescription:
         if (auto text = description(kind.type))
             map.set(key, std::move(*text));
@@ -219,8 +226,9 @@ void ItemAttributes::set(
         return map.set(key, downloadingStatus(facts));
     case AttributeKey::DocumentIdentifier:
         return map.set(key, documentIdentifier(facts));
+    case AttributeKey::TypeIdentifier:
     case AttributeKey::ThumbnailMap:
-        return;
+        return; // set by the callers
     }
 }
 

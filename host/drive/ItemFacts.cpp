@@ -102,7 +102,7 @@ int status(const std::string& path, struct statx& result)
 void readPromise(ItemFacts& facts, const std::string& itemPath, int missingReason)
 {
     static constexpr platform::Operation op{"-[LocalPromisedItems readPromise:]"};
-    const auto path = PromiseRecord::pathFor(itemPath);
+    auto path = PromiseRecord::pathFor(itemPath);
     const auto text = readSmallFile(path, PromiseRecord::maximumFileSize);
     if (text.error
         && (text.error->is(platform::FileErrorCode::NoSuchItem)
@@ -118,11 +118,18 @@ void readPromise(ItemFacts& facts, const std::string& itemPath, int missingReaso
         facts.error = text ? damagedRecord(path, "it does not hold a promise") : *text.error;
     if (facts.error)
         op.error("Cannot use the promise %@: %@", path, *facts.error);
+    facts.promisePath = std::move(path);
 }
 
 void look(ItemFacts& facts, const std::string& path)
 {
-    facts = {};
+    // Only what the last look left behind is cleared: this is done for every row of a list.
+    if (facts.presence == ItemFacts::Presence::Promised)
+        facts.promise = {};
+    else if (facts.presence == ItemFacts::Presence::Here)
+        facts.marks = {};
+    facts.presence = ItemFacts::Presence::Missing;
+    facts.error.reset();
     const int failure = status(path, facts.status);
     if (failure == ENOENT) {
         readPromise(facts, path, failure);

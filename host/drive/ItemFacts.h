@@ -45,6 +45,7 @@ struct ItemFacts {
     std::optional<platform::Error> error; ///< why it is missing, or why its promise cannot be used
     struct statx status { }; ///< of the item that is here
     PromiseRecord promise; ///< of the one that is promised
+    std::string promisePath; ///< where its promise lies
     ItemMarks marks; ///< of the item that is here
 
     bool isDirectory() const;

@@ -110,8 +110,9 @@ std::optional<std::string_view> JsonScanner::string()
         return std::nullopt;
     const auto begin = _at;
     _unescaped.clear();
-    bool escaped = false;
+    bool escaped = false, ascii = true;
     for (; _at < _text.size() && _text[_at] != '"'; ++_at) {
+        ascii = ascii && static_cast<signed char>(_text[_at]) >= 0;
         if (static_cast<unsigned char>(_text[_at]) < 0x20) {
             fail();
             return std::nullopt;
@@ -126,7 +127,8 @@ std::optional<std::string_view> JsonScanner::string()
         }
     }
     const auto content = escaped ? std::string_view(_unescaped) : _text.substr(begin, _at - begin);
-    if (!take('"') || !platform::isValidUtf8(content)) {
+    const bool needsCheck = escaped || !ascii;
+    if (!take('"') || (needsCheck && !platform::isValidUtf8(content))) {
         fail();
         return std::nullopt;
     }

@@ -54,8 +54,7 @@ platform::ItemReading LocalPromisedItems::readItem(const Url& url, platform::Att
     if (facts.presence == ItemFacts::Presence::Missing)
         return {facts.error, {}, url, {}};
     const bool isPromised = facts.presence == ItemFacts::Presence::Promised;
-    platform::ItemReading reading{
-        {}, {}, isPromised ? Url::fileURL(PromiseRecord::pathFor(url.path())) : url, {}};
+    platform::ItemReading reading{{}, {}, isPromised ? Url::fileURL(facts.promisePath) : url, {}};
     if (facts.error) {
         reading.values.error = facts.error;
         return reading;
