@@ -1,6 +1,6 @@
 #include "app/AppDelegate.h"
 #include "host/drive/LocalCloudDocumentService.h"
-#include "host/gtk/GtkApplicationLoop.h"
+#include "host/gtk/MakeApplication.h"
 #include "host/system/GLibDispatch.h"
 #include "host/system/GdkPixbufImageLoader.h"
 #include "host/system/GettextLocalization.h"
@@ -102,12 +102,10 @@ int main(int argc, char** argv)
     platform::installServices(std::move(set));
     tarrow::FileUtils::logFileAttributes(executable);
 
-    int status = 0;
-    {
-        host::gtk::GtkApplicationLoop application(
-            {.version = TRW_VERSION, .stateFile = layout.interfaceState()});
-        status = application.run(argc, argv, [] { return std::make_shared<tarrow::AppDelegate>(); });
-    }
+    auto application
+        = host::gtk::makeApplication({.version = TRW_VERSION, .stateFile = layout.interfaceState()});
+    const int status = application->run(argc, argv, [] { return std::make_shared<tarrow::AppDelegate>(); });
+    application.reset();
     platform::installServices({});
     return status;
 }

@@ -123,7 +123,12 @@ bool hasDisplayVariable()
 
 } // namespace
 
-GtkApplicationLoop::GtkApplicationLoop(Settings settings)
+std::unique_ptr<platform::Application> makeApplication(ApplicationSettings settings)
+{
+    return std::make_unique<GtkApplicationLoop>(std::move(settings));
+}
+
+GtkApplicationLoop::GtkApplicationLoop(ApplicationSettings settings)
     : _settings(std::move(settings))
     , _stateFile(_settings.stateFile)
 {

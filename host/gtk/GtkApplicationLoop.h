@@ -2,6 +2,7 @@
 
 #include "host/gtk/CommandLine.h"
 #include "host/gtk/GtkWindowHost.h"
+#include "host/gtk/MakeApplication.h"
 #include "host/gtk/StateFile.h"
 #include "platform/Application.h"
 
@@ -18,13 +19,7 @@ class BroadwayServer;
 /// Without a display the window is served to a web browser on this machine.
 class GtkApplicationLoop : public platform::Application {
 public:
-    struct Settings {
-        std::string applicationId = "app.tarrow.Drive";
-        std::string version;
-        std::string stateFile; ///< path of the file that keeps the interface's state
-    };
-
-    explicit GtkApplicationLoop(Settings settings);
+    explicit GtkApplicationLoop(ApplicationSettings settings);
     ~GtkApplicationLoop() override;
 
     /// The exit status is 0 after the window was closed, 64 for arguments that are not understood, 69 where
@@ -50,7 +45,7 @@ private:
     void resignActive();
     void windowShown(WindowPeer& window);
 
-    Settings _settings;
+    ApplicationSettings _settings;
     StateFile _stateFile;
     std::unique_ptr<BroadwayServer> _broadway;
     ObjectRef<AdwApplication> _application;

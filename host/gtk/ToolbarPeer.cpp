@@ -24,12 +24,14 @@ bool hasTakingView(const ui::BarButtonItems& items)
 
 ToolbarPeer::ToolbarPeer(std::shared_ptr<PeerContext> context)
     : _context(std::move(context))
-    , _bar(ObjectRef<GtkWidget>::retain(gtk_action_bar_new()))
+    , _bar(ObjectRef<GtkWidget>::retain(gtk_revealer_new()))
     , _box(gtk_box_new(GTK_ORIENTATION_HORIZONTAL, itemDistance))
 {
+    // GtkActionBar keeps its three groups apart; here the entries share the whole width.
     gtk_widget_set_hexpand(_box, TRUE);
-    gtk_widget_add_css_class(widget(), "kit-toolbar");
-    gtk_action_bar_pack_start(GTK_ACTION_BAR(widget()), _box);
+    gtk_widget_add_css_class(_box, "kit-toolbar");
+    gtk_revealer_set_transition_type(GTK_REVEALER(widget()), GTK_REVEALER_TRANSITION_TYPE_SLIDE_UP);
+    gtk_revealer_set_child(GTK_REVEALER(widget()), _box);
 }
 
 ToolbarPeer::~ToolbarPeer()
@@ -73,7 +75,7 @@ void ToolbarPeer::append(const std::shared_ptr<ui::BarButtonItem>& item, bool vi
 
 void ToolbarPeer::setHidden(bool hidden)
 {
-    gtk_action_bar_set_revealed(GTK_ACTION_BAR(widget()), !hidden);
+    gtk_revealer_set_reveal_child(GTK_REVEALER(widget()), !hidden);
 }
 
 } // namespace host::gtk
