@@ -92,6 +92,11 @@ void NavigationBarPeer::showItems(const ui::NavigationItem& item)
         add(entry, adw_header_bar_pack_end);
 }
 
+void NavigationBarPeer::setNarrow(bool narrow)
+{
+    adw_header_bar_set_decoration_layout(ADW_HEADER_BAR(widget()), narrow ? ":close" : nullptr);
+}
+
 void NavigationBarPeer::setWindowButtons(bool shown)
 {
     adw_header_bar_set_show_start_title_buttons(ADW_HEADER_BAR(widget()), shown);

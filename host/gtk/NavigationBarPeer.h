@@ -23,6 +23,8 @@ public:
 
     /// `hasBackTarget` says whether there is a screen to go back to.
     void show(const platform::ui::NavigationItem& item, bool hasBackTarget);
+    /// A narrow bar keeps of the window's own buttons only the one that closes it.
+    void setNarrow(bool narrow);
     /// Whether the window's own buttons stand in this bar.
     void setWindowButtons(bool shown);
 

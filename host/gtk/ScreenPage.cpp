@@ -3,6 +3,7 @@
 #include "host/gtk/ViewPeer.h"
 #include "platform/ui/NavigationController.h"
 #include "platform/ui/NavigationItem.h"
+#include "platform/ui/TraitCollection.h"
 
 namespace host::gtk {
 
@@ -56,11 +57,12 @@ void ScreenPage::load()
     if (_content || !shown)
         return;
     _content = makePeer(_context, shown->view());
-    _content->setRoot([navigation = _navigation, weak = _screen](platform::Size size) {
+    _content->setRoot([this, navigation = _navigation, weak = _screen](platform::Size size) {
         const auto stack = navigation.lock();
         const auto resized = weak.lock();
         if (stack && resized)
             stack->screenResized(*resized, size);
+        updateBars();
     });
     gtk_widget_set_vexpand(_content->widget(), TRUE);
     gtk_box_insert_child_after(GTK_BOX(widget()), _content->widget(), _navigationBar.widget());
@@ -85,6 +87,7 @@ void ScreenPage::mirrorBars()
     const auto& screens = stack->viewControllers();
     const bool hasBackTarget = !screens.empty() && screens.front() != shown;
     _navigationBar.show(shown->navigationItem(), hasBackTarget);
+    _navigationBar.setNarrow(shown->traits().horizontalSizeClass == ui::SizeClass::Compact);
     _toolbar.show(shown->toolbarItems());
     _toolbar.setHidden(stack->isToolbarHidden() || shown->toolbarItems().empty());
 }
