@@ -134,13 +134,15 @@ TEST_P(DispatchContract, WorkOfADestroyedQueueNeverRunsAndLetsGoOfWhatItHolds)
     // The first work destroys the queue that it runs on: nothing may wait for itself.
     auto queue = dispatch.makeSerialQueue("short-lived");
     std::promise<void> bothAreIn;
+    std::atomic<bool> isGone = false;
     queue->async([&] {
         bothAreIn.get_future().wait();
         queue.reset();
+        isGone = true;
     });
     queue->async([&ran, kept = std::move(held)] { ran = true; });
     bothAreIn.set_value();
-    runUntil([&] { return watched.expired(); });
+    runUntil([&] { return isGone && watched.expired(); });
     dispatch.after(5ms, dispatch.mainQueue(), [&] { later = true; });
     runUntil([&] { return later; });
     EXPECT_FALSE(ran);
