@@ -1,5 +1,4 @@
 #include "items/FileUtils.h"
-#include "items/Settings.h"
 #include "platform/TypeRegistry.h"
 #include "tests/items/support/ItemsFixture.h"
 
@@ -120,12 +119,6 @@ TEST_F(FileUtilsTest, JudgesNames)
              "a\u0378", "a\xff", "a\xc0\xaf"})
         EXPECT_FALSE(FileUtils::isValidFilename(name)) << name;
     EXPECT_FALSE(FileUtils::isValidFilename(std::string_view("a\0b", 3)));
-}
-
-TEST_F(FileUtilsTest, KnowsItsSettings)
-{
-    EXPECT_TRUE(Settings::quickLaunch());
-    EXPECT_EQ(Settings::batonneTarrowActivityType(), "BrindleDocsID.viewing");
 }
 
 } // namespace
