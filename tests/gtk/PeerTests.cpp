@@ -1,0 +1,179 @@
+#include "WindowFixture.h"
+#include "platform/Color.h"
+#include "platform/ui/Button.h"
+#include "platform/ui/Label.h"
+#include "platform/ui/StackView.h"
+#include "platform/ui/TextField.h"
+#include "platform/ui/ViewController.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+namespace ui = platform::ui;
+using platform::Rect;
+using testing_support::makeScreen;
+
+class PeerTests : public testing_support::WindowFixture {
+protected:
+    /// Shows a screen with this view at a frame.
+    std::shared_ptr<ui::View> showOne(const std::shared_ptr<ui::View>& view, const Rect& frame)
+    {
+        const auto screen = makeScreen("");
+        view->setFrame(frame);
+        screen->view()->addSubview(view);
+        show(screen);
+        return screen->view();
+    }
+};
+
+TEST_F(PeerTests, WidgetsStandWhereTheModelPutsThem)
+{
+    const auto label = std::make_shared<ui::Label>("Some words"),
+               second = std::make_shared<ui::Label>("More");
+    const auto button = std::make_shared<ui::Button>("Press");
+    const auto stack = std::make_shared<ui::StackView>(ui::Axis::Vertical);
+    for (const auto& view : std::vector<std::shared_ptr<ui::View>>{label, second, button})
+        stack->addArrangedSubview(view);
+    stack->setSpacing(8);
+    const auto root = showOne(stack, {20, 30, 300, 200});
+    EXPECT_EQ(root->frame().size(), window->bounds().size());
+
+    for (const auto& view : std::vector<std::shared_ptr<ui::View>>{label, second, button}) {
+        const auto shown = boundsIn(*view, *stack);
+        EXPECT_NEAR(shown.x, view->frame().x, 1);
+        EXPECT_NEAR(shown.y, view->frame().y, 1);
+        EXPECT_NEAR(shown.width, view->frame().width, 1);
+    }
+    EXPECT_EQ(boundsIn(*stack, *root).origin(), (platform::Point{20, 30}));
+
+    stack->setFrame({40, 50, 300, 200});
+    second->setHidden(true);
+    settle();
+    EXPECT_EQ(boundsIn(*stack, *root).origin(), (platform::Point{40, 50}));
+    EXPECT_FALSE(gtk_widget_get_visible(peerOf(*second)->widget()));
+    EXPECT_NEAR(boundsIn(*button, *stack).y, button->frame().y, 1);
+}
+
+TEST_F(PeerTests, ATextThatFitsItsMeasureIsNotCut)
+{
+    for (const char* text : {"iiiiiiii", "Wide Words", "مرحبا", "naïve – ☂"}) {
+        const auto label = std::make_shared<ui::Label>(text);
+        label->sizeToFit();
+        const auto screen = makeScreen("");
+        screen->view()->addSubview(label);
+        show(screen);
+        label->sizeToFit(); // with the window's own measurer
+        settle();
+        EXPECT_FALSE(pango_layout_is_ellipsized(gtk_label_get_layout(GTK_LABEL(nativeOf(*label))))) << text;
+    }
+}
+
+TEST_F(PeerTests, ChangesOfOneFrameAreShownTogether)
+{
+    const auto label = std::make_shared<ui::Label>("one");
+    showOne(label, {0, 0, 100, 30});
+    int notices = 0;
+    g_signal_connect_swapped(
+        nativeOf(*label), "notify::label", G_CALLBACK(+[](int* count) { ++*count; }), &notices);
+    for (const char* text : {"two", "three", "four"})
+        label->setText(text);
+    settle();
+    EXPECT_STREQ(gtk_label_get_label(GTK_LABEL(nativeOf(*label))), "four");
+    EXPECT_EQ(notices, 1);
+}
+
+TEST_F(PeerTests, APressReachesTheActionOnlyWhileTheButtonIsEnabled)
+{
+    int presses = 0;
+    const auto button = std::make_shared<ui::Button>("Press", [&] { ++presses; });
+    showOne(button, {10, 10, 80, 20});
+    g_signal_emit_by_name(nativeOf(*button), "clicked");
+    EXPECT_EQ(presses, 1);
+    button->setEnabled(false);
+    settle();
+    EXPECT_FALSE(gtk_widget_is_sensitive(nativeOf(*button)));
+    // A finger is larger than the button.
+    EXPECT_TRUE(gtk_widget_contains(nativeOf(*button), 40, -10));
+    EXPECT_FALSE(gtk_widget_contains(nativeOf(*button), 40, -13));
+}
+
+/// Refuses digits.
+class NoDigits : public ui::TextFieldDelegate {
+public:
+    bool textFieldShouldChangeCharactersInRangeReplacementString(
+        ui::TextField&, const ui::TextRange&, const std::string& replacement) override
+    {
+        return replacement.find_first_of("0123456789") == std::string::npos;
+    }
+};
+
+TEST_F(PeerTests, AFieldFollowsTheEditsThatItsDelegateAllows)
+{
+    const auto field = std::make_shared<ui::TextField>("Report.pdf");
+    const auto delegate = std::make_shared<NoDigits>();
+    field->setDelegate(delegate);
+    showOne(field, {10, 10, 300, 40});
+    auto* editable = GTK_EDITABLE(nativeOf(*field));
+
+    field->setSelectedRange({6, 0});
+    settle();
+    EXPECT_EQ(gtk_editable_get_position(editable), 6);
+    int position = 6;
+    gtk_editable_insert_text(editable, "s", -1, &position);
+    EXPECT_EQ(field->text(), "Reports.pdf");
+    gtk_editable_insert_text(editable, "7", -1, &position);
+    settle();
+    EXPECT_EQ(field->text(), "Reports.pdf");
+    EXPECT_STREQ(gtk_editable_get_text(editable), "Reports.pdf");
+}
+
+TEST_F(PeerTests, StandardColoursFollowTheTheme)
+{
+    showOne(std::make_shared<ui::View>(), {});
+    auto& theme = peer().context()->theme();
+    auto* style = adw_style_manager_get_default();
+    const auto brightness = [&](host::gtk::ColorUse use, const platform::Color& color) {
+        const auto shown = theme.resolve(color, use);
+        return (shown.red + shown.green + shown.blue) / 3;
+    };
+    using host::gtk::ColorUse;
+    EXPECT_GT(brightness(ColorUse::Background, platform::Color::white()), 0.9F);
+    adw_style_manager_set_color_scheme(style, ADW_COLOR_SCHEME_FORCE_DARK);
+    settle();
+    EXPECT_LT(brightness(ColorUse::Background, platform::Color::white()), 0.3F);
+    EXPECT_GT(brightness(ColorUse::Content, platform::Color::black()), 0.7F);
+    EXPECT_GT(brightness(ColorUse::Content, platform::Color::white()), 0.9F);
+    EXPECT_EQ(window->traits().colorScheme, ui::ColorScheme::Dark);
+    adw_style_manager_set_color_scheme(style, ADW_COLOR_SCHEME_FORCE_LIGHT);
+}
+
+TEST_F(PeerTests, NothingThatHasEndedIsCalled)
+{
+    const auto screen = makeScreen("");
+    auto button = std::make_shared<ui::Button>("Gone");
+    auto label = std::make_shared<ui::Label>("Stays");
+    screen->view()->addSubview(button);
+    screen->view()->addSubview(label);
+    show(screen);
+    auto* native = GTK_WIDGET(g_object_ref(nativeOf(*button)));
+
+    // The view ends; its widget is pressed before the next frame.
+    button->setTitle("Changed");
+    button->removeFromSuperview();
+    button.reset();
+    g_signal_emit_by_name(native, "clicked");
+    settle();
+    g_signal_emit_by_name(native, "clicked");
+    g_object_unref(native);
+
+    // The window ends with a change still waiting; the view lives on.
+    label->setText("Changed");
+    host->close();
+    label->setText("Again");
+    label->setFrame({1, 2, 3, 4});
+    while (g_main_context_iteration(nullptr, FALSE)) { }
+    EXPECT_EQ(label->text(), "Again");
+}
+
+} // namespace
