@@ -269,8 +269,9 @@ TEST_F(ListTests, AHundredThousandRowsCostWhatIsNearTheVisibleOnes)
     EXPECT_EQ(list->visibleRows().first, 70'000U);
     expectRowsMatch();
     for (auto* row : listPeer().liveRows()) {
-        if (list->visibleRows().contains(host::gtk::ListRowWidget::position(row)))
+        if (list->visibleRows().contains(host::gtk::ListRowWidget::position(row))) {
             EXPECT_EQ(gtk_widget_get_height(row), static_cast<int>(list->rowHeight()));
+        }
     }
 }
 
