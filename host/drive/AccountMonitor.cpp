@@ -7,6 +7,8 @@ namespace host::drive {
 
 namespace {
 
+constexpr platform::Duration retryDelay = std::chrono::seconds(2);
+
 std::optional<std::string> currentIdentity(const DriveLayout& layout)
 {
     const auto record = AccountRecord::read(layout);
@@ -19,7 +21,7 @@ std::shared_ptr<AccountMonitor> AccountMonitor::start(
     const DriveLayout& layout, const DriveDependencies& dependencies)
 {
     std::shared_ptr<AccountMonitor> monitor(new AccountMonitor(layout, dependencies));
-    monitor->watch();
+    monitor->begin();
     return monitor;
 }
 
@@ -31,25 +33,45 @@ AccountMonitor::AccountMonitor(const DriveLayout& layout, const DriveDependencie
 {
 }
 
-void AccountMonitor::watch()
+bool AccountMonitor::watch()
 {
-    static constexpr platform::Operation op{"-[AccountMonitor watch]"};
     // The folder is watched rather than the file, so that its creation and its replacement are seen.
     _watch = FolderWatch::start(_layout.home(), [weak = weak_from_this()](const std::string& name) {
         if (const auto self = weak.lock())
             self->nameChanged(name);
     });
-    if (!_watch)
+    return _watch != nullptr;
+}
+
+void AccountMonitor::begin()
+{
+    static constexpr platform::Operation op{"-[AccountMonitor begin]"};
+    if (!watch()) {
         op.warning("Cannot watch the account's folder %@", _layout.home());
+        watchLater();
+    }
     // Read after the watch began, so that no change falls between the two.
     _identity = currentIdentity(_layout);
 }
 
+// The folder went away, as when its volume was taken off; it may come back.
+void AccountMonitor::watchLater()
+{
+    _dispatch->after(retryDelay, _dispatch->mainQueue(), [weak = weak_from_this()] {
+        const auto self = weak.lock();
+        if (self && self->watch())
+            self->check();
+        else if (self)
+            self->watchLater();
+    });
+}
+
 void AccountMonitor::nameChanged(const std::string& name)
 {
-    if (!name.empty() && name != DriveLayout::accountFileName)
-        return;
-    check();
+    if (name.empty() && !watch())
+        watchLater();
+    if (name.empty() || name == DriveLayout::accountFileName)
+        check();
 }
 
 void AccountMonitor::check()

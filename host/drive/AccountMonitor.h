@@ -30,7 +30,9 @@ public:
 private:
     AccountMonitor(const DriveLayout& layout, const DriveDependencies& dependencies);
 
-    void watch();
+    void begin();
+    bool watch();
+    void watchLater();
     void nameChanged(const std::string& name);
     void identityRead(std::optional<std::string> identity);
 

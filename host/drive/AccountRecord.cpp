@@ -1,9 +1,9 @@
 #include "host/drive/AccountRecord.h"
 
+#include "host/drive/JsonObject.h"
 #include "host/drive/SmallFile.h"
 
 #include <glib.h>
-#include <nlohmann/json.hpp>
 
 namespace host::drive {
 
@@ -13,35 +13,29 @@ using nlohmann::json;
 using platform::Result;
 using platform::StorageOffer;
 
-std::string text(const json& object, const char* key)
-{
-    const auto found = object.find(key);
-    return found != object.end() && found->is_string() ? found->get<std::string>() : std::string();
-}
-
 int integer(const json& object, const char* key)
 {
-    const auto found = object.find(key);
-    return found != object.end() && found->is_number_integer() ? found->get<int>() : 0;
+    const auto& value = member(object, key);
+    return value.is_number_integer() ? value.get<int>() : 0;
 }
 
 bool flag(const json& object, const char* key)
 {
-    const auto found = object.find(key);
-    return found != object.end() && found->is_boolean() && found->get<bool>();
+    const auto& value = member(object, key);
+    return value.is_boolean() && value.get<bool>();
 }
 
 std::optional<StorageOffer> offer(const json& account)
 {
-    const auto found = account.find("storageOffer");
-    if (found == account.end() || !found->is_object())
+    const auto& found = member(account, "storageOffer");
+    if (!found.is_object())
         return std::nullopt;
     StorageOffer result;
-    result.level = integer(*found, "level");
-    result.storageIsLow = flag(*found, "storageIsLow");
-    result.buttonTitle = text(*found, "buttonTitle");
-    if (const auto link = found->find("link"); link != found->end() && link->is_object())
-        result.link = {integer(*link, "action"), text(*link, "target")};
+    result.level = integer(found, "level");
+    result.storageIsLow = flag(found, "storageIsLow");
+    result.buttonTitle = textMember(found, "buttonTitle");
+    if (const auto& link = member(found, "link"); link.is_object())
+        result.link = {integer(link, "action"), textMember(link, "target")};
     return result;
 }
 
@@ -57,10 +51,11 @@ Result<AccountRecord> AccountRecord::read(const DriveLayout& layout)
 
 Result<AccountRecord> AccountRecord::parse(const std::string& content, const std::string& path)
 {
-    const auto account = json::parse(content, nullptr, false);
-    if (!account.is_object())
+    const auto account = parseJsonObject(content);
+    if (!account)
         return damagedRecord(path, "it does not hold an account");
-    AccountRecord record{text(account, "identity"), text(account, "displayName"), offer(account)};
+    AccountRecord record{
+        textMember(*account, "identity"), textMember(*account, "displayName"), offer(*account)};
     if (record.identity.empty())
         return damagedRecord(path, "it names no account");
     return record;

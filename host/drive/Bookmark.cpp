@@ -1,8 +1,7 @@
 #include "host/drive/Bookmark.h"
 
+#include "host/drive/JsonObject.h"
 #include "host/drive/LinkRecords.h"
-
-#include <nlohmann/json.hpp>
 
 namespace host::drive {
 
@@ -50,12 +49,6 @@ std::optional<std::string> base64Decoded(std::string_view text)
     return bytes;
 }
 
-std::string text(const json& object, const char* key)
-{
-    const auto found = object.find(key);
-    return found != object.end() && found->is_string() ? found->get<std::string>() : std::string();
-}
-
 std::optional<std::uint32_t> identifier(const json& object)
 {
     const auto found = object.find("document");
@@ -81,12 +74,12 @@ std::optional<Bookmark> Bookmark::decode(std::string_view encodedText)
     if (encodedText.size() > maximumLength)
         return std::nullopt;
     const auto bytes = base64Decoded(encodedText);
-    const auto object = bytes ? json::parse(*bytes, nullptr, false) : json();
-    if (!object.is_object() || !object.contains("v") || object["v"] != 1)
+    const auto object = bytes ? parseJsonObject(*bytes) : std::nullopt;
+    if (!object || member(*object, "v") != 1)
         return std::nullopt;
-    const auto document = identifier(object);
-    Bookmark bookmark{
-        text(object, "account"), text(object, "container"), text(object, "path"), document.value_or(0)};
+    const auto document = identifier(*object);
+    Bookmark bookmark{textMember(*object, "account"), textMember(*object, "container"),
+        textMember(*object, "path"), document.value_or(0)};
     if (!document || bookmark.account.empty() || !isPlainRelativePath(bookmark.container)
         || bookmark.container.find('/') != std::string::npos || !isPlainRelativePath(bookmark.path))
         return std::nullopt;

@@ -1,6 +1,6 @@
 #include "host/drive/ContainerRecord.h"
 
-#include <nlohmann/json.hpp>
+#include "host/drive/JsonObject.h"
 
 namespace host::drive {
 
@@ -9,25 +9,13 @@ namespace {
 using nlohmann::json;
 using platform::DocumentType;
 
-const json& member(const json& object, const char* key)
-{
-    static const json absent;
-    const auto found = object.find(key);
-    return found == object.end() ? absent : *found;
-}
-
-std::optional<std::string> text(const json& value)
-{
-    return value.is_string() ? std::optional(value.get<std::string>()) : std::nullopt;
-}
-
 std::map<std::string, std::string> readNames(const json& object)
 {
     std::map<std::string, std::string> names;
     if (!object.is_object())
         return names;
     for (const auto& [language, name] : object.items()) {
-        if (auto known = text(name); known && !known->empty())
+        if (auto known = textOf(name); known && !known->empty())
             names.emplace(language, std::move(*known));
     }
     return names;
@@ -41,10 +29,10 @@ std::vector<DocumentType> readTypes(const json& list)
     for (const auto& entry : list) {
         if (!entry.is_object())
             continue;
-        DocumentType type{text(member(entry, "name")).value_or(""), {}};
+        DocumentType type{textOf(member(entry, "name")).value_or(""), {}};
         if (const auto& contents = member(entry, "contentTypes"); contents.is_array()) {
             for (const auto& content : contents)
-                type.contentTypes.push_back(text(content));
+                type.contentTypes.push_back(textOf(content));
         }
         types.push_back(std::move(type));
     }
@@ -57,7 +45,7 @@ std::vector<std::string> readTexts(const json& list)
     if (!list.is_array())
         return texts;
     for (const auto& entry : list) {
-        if (auto known = text(entry))
+        if (auto known = textOf(entry))
             texts.push_back(std::move(*known));
     }
     return texts;
@@ -67,15 +55,15 @@ std::vector<std::string> readTexts(const json& list)
 
 std::optional<ContainerRecord> ContainerRecord::parse(const std::string& content)
 {
-    const auto object = json::parse(content, nullptr, false);
-    if (!object.is_object())
+    const auto object = parseJsonObject(content);
+    if (!object)
         return std::nullopt;
     ContainerRecord record;
-    record.names = readNames(member(object, "names"));
-    record.documentTypes = readTypes(member(object, "documentTypes"));
-    record.supportedFolderLevels = text(member(object, "supportedFolderLevels"));
-    record.owningApps = readTexts(member(object, "owningApps"));
-    record.iconName = text(member(object, "icon"));
+    record.names = readNames(member(*object, "names"));
+    record.documentTypes = readTypes(member(*object, "documentTypes"));
+    record.supportedFolderLevels = textOf(member(*object, "supportedFolderLevels"));
+    record.owningApps = readTexts(member(*object, "owningApps"));
+    record.iconName = textOf(member(*object, "icon"));
     return record;
 }
 

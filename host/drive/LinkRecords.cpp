@@ -1,8 +1,7 @@
 #include "host/drive/LinkRecords.h"
 
+#include "host/drive/JsonObject.h"
 #include "host/drive/SmallFile.h"
-
-#include <nlohmann/json.hpp>
 
 namespace host::drive {
 
@@ -14,21 +13,15 @@ using platform::Url;
 
 constexpr std::size_t longestPath = 4096; // PATH_MAX
 
-std::string text(const json& object, const char* key)
-{
-    const auto found = object.find(key);
-    return found != object.end() && found->is_string() ? found->get<std::string>() : std::string();
-}
-
 Result<json> readObject(const std::string& path)
 {
     const auto content = readSmallFile(path, maximumLinkRecordSize);
     if (!content)
         return *content.error;
-    auto object = json::parse(*content, nullptr, false);
-    if (!object.is_object())
+    auto object = parseJsonObject(*content);
+    if (!object)
         return damagedRecord(path, "it does not hold a reference");
-    return object;
+    return std::move(*object);
 }
 
 bool isPlainAbsolutePath(std::string_view path)
@@ -68,8 +61,8 @@ Result<Url> readReference(const std::string& path, const DriveLayout& layout)
     const auto object = readObject(path);
     if (!object)
         return *object.error;
-    const auto container = text(*object, "container");
-    const auto target = text(*object, "path");
+    const auto container = textMember(*object, "container");
+    const auto target = textMember(*object, "path");
     if (!isPlainRelativePath(container) || container.find('/') != std::string::npos)
         return damagedRecord(path, "it names no container");
     if (!isPlainRelativePath(target))
@@ -82,7 +75,7 @@ Result<Url> readAlias(const std::string& path, const DriveLayout& layout)
     const auto object = readObject(path);
     if (!object)
         return *object.error;
-    const auto target = text(*object, "path");
+    const auto target = textMember(*object, "path");
     if (isPlainAbsolutePath(target))
         return Url::fileURL(target);
     if (!isPlainRelativePath(target))

@@ -29,6 +29,16 @@ bool isIdentifier(std::string_view name)
     return !name.empty() && !name.starts_with('.') && platform::isValidUtf8(name);
 }
 
+using Text = std::unique_ptr<char, decltype(&g_free)>;
+
+// Names in the user's order, without regard to case.
+std::string sortKey(const std::string& name)
+{
+    const Text folded(g_utf8_casefold(name.c_str(), -1), &g_free);
+    const Text key(g_utf8_collate_key(folded.get(), -1), &g_free);
+    return key.get();
+}
+
 } // namespace
 
 std::vector<std::string> userLanguages()
@@ -141,8 +151,8 @@ std::vector<ContainerPointer> LocalContainers::allContainers() const
         const bool bIsDefault = b->identifier == DriveLayout::defaultContainerIdentifier;
         if (aIsDefault != bIsDefault)
             return aIsDefault;
-        const int order = g_utf8_collate(a->localizedName.c_str(), b->localizedName.c_str());
-        return order != 0 ? order < 0 : a->identifier < b->identifier;
+        const auto aName = sortKey(a->localizedName), bName = sortKey(b->localizedName);
+        return aName != bName ? aName < bName : a->identifier < b->identifier;
     });
     return containers;
 }

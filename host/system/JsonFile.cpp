@@ -45,7 +45,9 @@ int nesting(std::string_view text)
 
 std::unique_ptr<json> parseJson(std::string_view text, JsonLimits limits)
 {
-    if (text.size() > limits.bytes || nesting(text) > limits.depth)
+    // The parser takes a NUL for the end of the text, whatever follows it.
+    if (text.size() > limits.bytes || nesting(text) > limits.depth
+        || text.find('\0') != std::string_view::npos)
         return nullptr;
     auto value = std::make_unique<json>(json::parse(text, nullptr, false));
     return value->is_discarded() ? nullptr : std::move(value);

@@ -69,6 +69,22 @@ TEST_F(AccountTests, tellsOfEveryChangeOfIdentityOnceAndOfNothingElse)
     EXPECT_EQ(_notices, 3);
 }
 
+TEST_F(AccountTests, followsAFolderThatGoesAwayAndComesBack)
+{
+    const auto home = _drive.layout().home();
+    std::filesystem::rename(home, home + "-away");
+    _drive.settle();
+    EXPECT_EQ(_notices, 1);
+    EXPECT_FALSE(token());
+
+    std::filesystem::rename(home + "-away", home);
+    _drive.dispatch->advance(10);
+    EXPECT_EQ(_notices, 2);
+    _drive.signIn("Jonas");
+    _drive.settle();
+    EXPECT_EQ(_notices, 3) << "the folder is watched again";
+}
+
 TEST_F(AccountTests, aDamagedAccountIsNobodyAndIsLeftAsItIs)
 {
     const std::string whole = R"({"identity": "account-1"})";
