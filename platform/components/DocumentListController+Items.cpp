@@ -73,7 +73,6 @@ void DocumentListController::setSelectedItems(const std::vector<Url>& items)
     ui::SelectionModel selection;
     for (const auto& item : items)
         selection.select(_contents->rows()->idFor(item));
-    selection.keepOnly(_contents->rows()->ids());
     _listView->setSelection(std::move(selection));
     selectionDidChange(*_listView);
 }
