@@ -206,6 +206,17 @@ TEST_F(Layout, TakingAViewOutEndsItsTiesToTheRest)
     EXPECT_EQ(inner->frame().width, 360);
 }
 
+TEST_F(Layout, ATreeThatWasLaidOutEndsWithItsOwner)
+{
+    auto view = std::make_shared<View>(Rect{0, 0, 100, 100});
+    view->addSubview(std::make_shared<View>());
+    view->layoutIfNeeded();
+    const std::weak_ptr<View> outer = view, inside = view->subviews().front();
+    view = nullptr;
+    EXPECT_TRUE(outer.expired());
+    EXPECT_TRUE(inside.expired());
+}
+
 TEST_F(Layout, FramesLieOnDevicePixels)
 {
     Screen screen;
