@@ -9,6 +9,7 @@ endfunction()
 
 trw_package(glib glib-2.0 gobject-2.0 gio-2.0 gio-unix-2.0)
 trw_package(gtk gtk4 libadwaita-1)
+trw_package(atspi atspi-2 gobject-2.0)
 trw_package(icu icu-i18n icu-uc)
 trw_package(sqlite sqlite3)
 trw_package(cairo cairo)

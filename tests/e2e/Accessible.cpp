@@ -1,0 +1,114 @@
+#include "Accessible.h"
+
+#include <algorithm>
+
+namespace e2e {
+
+namespace {
+
+constexpr int mostChildren = 40;
+constexpr guint patience = 20'000, pause = 50; ///< milliseconds
+
+} // namespace
+
+Accessible::Accessible(AtspiAccessible* node)
+    : _node(node, [](AtspiAccessible* held) {
+        if (held)
+            g_object_unref(held);
+    })
+{
+    if (!node)
+        _node.reset();
+}
+
+std::string Accessible::name() const
+{
+    char* text = atspi_accessible_get_name(_node.get(), nullptr);
+    std::string answer = text ? text : "";
+    g_free(text);
+    return answer;
+}
+
+bool Accessible::isVisible() const
+{
+    auto* states = atspi_accessible_get_state_set(_node.get());
+    const bool visible = states && atspi_state_set_contains(states, ATSPI_STATE_VISIBLE);
+    if (states)
+        g_object_unref(states);
+    return visible;
+}
+
+bool Accessible::isButton() const
+{
+    return atspi_accessible_get_role(_node.get(), nullptr) == ATSPI_ROLE_PUSH_BUTTON;
+}
+
+bool Accessible::press() const
+{
+    auto* action = atspi_accessible_get_action_iface(_node.get());
+    if (!action)
+        return false;
+    const bool done =
+        atspi_action_get_n_actions(action, nullptr) > 0 && atspi_action_do_action(action, 0, nullptr);
+    g_object_unref(action);
+    return done;
+}
+
+void Accessible::collect(
+    const std::function<bool(const Accessible&)>& matches, std::vector<Accessible>& found) const
+{
+    const int count = std::min(atspi_accessible_get_child_count(_node.get(), nullptr), mostChildren);
+    for (int i = 0; i < count; ++i) {
+        const Accessible child(atspi_accessible_get_child_at_index(_node.get(), i, nullptr));
+        if (!child || !child.isVisible())
+            continue;
+        if (matches(child))
+            found.push_back(child);
+        child.collect(matches, found);
+    }
+}
+
+std::vector<Accessible> Accessible::all(const std::function<bool(const Accessible&)>& matches) const
+{
+    std::vector<Accessible> found;
+    if (_node)
+        collect(matches, found);
+    return found;
+}
+
+Accessible Accessible::application(const std::string& program)
+{
+    const Accessible desktop(atspi_get_desktop(0));
+    const int count = atspi_accessible_get_child_count(desktop._node.get(), nullptr);
+    for (int i = 0; i < count; ++i) {
+        const Accessible child(atspi_accessible_get_child_at_index(desktop._node.get(), i, nullptr));
+        if (child && child.name() == program)
+            return child;
+    }
+    return {};
+}
+
+bool Accessible::waitFor(const std::function<bool()>& condition)
+{
+    bool isLate = false;
+    const guint alarm = g_timeout_add(
+        patience,
+        [](gpointer late) -> gboolean {
+            *static_cast<bool*>(late) = true;
+            return G_SOURCE_CONTINUE;
+        },
+        &isLate);
+    // The tree tells nothing by itself: it is looked at again after each tick.
+    const guint tick = g_timeout_add(
+        pause, [](gpointer) -> gboolean { return G_SOURCE_CONTINUE; }, nullptr);
+    bool holds = condition();
+    while (!holds && !isLate) {
+        g_main_context_iteration(nullptr, TRUE);
+        holds = condition();
+    }
+    g_source_remove(alarm);
+    g_source_remove(tick);
+    return holds;
+}
+
+} // namespace e2e

@@ -1,0 +1,96 @@
+#include "Accessible.h"
+
+#include <gmock/gmock.h>
+
+#include <cstdlib>
+#include <fcntl.h>
+#include <fstream>
+#include <regex>
+#include <signal.h>
+#include <spawn.h>
+#include <sys/wait.h>
+
+namespace {
+
+using e2e::Accessible;
+
+/// The real program on the sample drive, driven through its accessibility tree.
+class BrowseTests : public ::testing::Test {
+protected:
+    void SetUp() override
+    {
+        ASSERT_EQ(atspi_init(), 0);
+        // The first look starts the registry; a program that comes before it may stay unseen.
+        atspi_accessible_get_child_count(atspi_get_desktop(0), nullptr);
+        start();
+        ASSERT_TRUE(
+            Accessible::waitFor([this] { return bool(program = Accessible::application("tarrow-drive")); }));
+    }
+
+    void TearDown() override
+    {
+        if (process > 0)
+            stop();
+        std::ifstream errors(getenv("TRW_ERRORS"));
+        const std::regex complaint(
+            "(Gtk|Gdk|Gsk|Adwaita|GLib|GLib-GObject|GLib-GIO|Pango)-(WARNING|CRITICAL|ERROR)");
+        for (std::string line; std::getline(errors, line);)
+            EXPECT_FALSE(std::regex_search(line, complaint)) << line;
+    }
+
+    void start()
+    {
+        const char* path = getenv("TRW_PROGRAM");
+        posix_spawn_file_actions_t actions;
+        posix_spawn_file_actions_init(&actions);
+        posix_spawn_file_actions_addopen(
+            &actions, 2, getenv("TRW_ERRORS"), O_WRONLY | O_CREAT | O_TRUNC, 0600);
+        char* const arguments[] = {const_cast<char*>(path), nullptr};
+        EXPECT_EQ(posix_spawn(&process, path, &actions, nullptr, arguments, environ), 0);
+        posix_spawn_file_actions_destroy(&actions);
+    }
+
+    /// Asks the program to end, and expects that it does so in order.
+    void stop()
+    {
+        kill(process, SIGTERM);
+        int status = 0;
+        EXPECT_TRUE(Accessible::waitFor([&] { return waitpid(process, &status, WNOHANG) == process; }));
+        EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0) << status;
+        process = -1;
+    }
+
+    std::vector<Accessible> buttons(const std::string& beginning) const
+    {
+        return program.all([&](const Accessible& node) {
+            return node.isButton() && node.name().compare(0, beginning.size(), beginning) == 0;
+        });
+    }
+    bool shows(const std::string& beginning) const { return !buttons(beginning).empty(); }
+    /// Presses the frontmost button whose name begins so.
+    void press(const std::string& beginning)
+    {
+        ASSERT_TRUE(Accessible::waitFor([&] { return shows(beginning); })) << beginning;
+        ASSERT_TRUE(buttons(beginning).back().press()) << beginning;
+    }
+
+    Accessible program;
+    pid_t process = -1;
+};
+
+TEST_F(BrowseTests, TwoFoldersInAndBack)
+{
+    press("Notebook");
+    EXPECT_TRUE(Accessible::waitFor([this] { return shows("Ideas.md"); }));
+    press("Travel");
+    // The list of the second folder has its own back button in front of the first one's.
+    EXPECT_TRUE(Accessible::waitFor([this] { return buttons("Back").size() == 2; }));
+    press("Back");
+    EXPECT_TRUE(Accessible::waitFor([this] { return buttons("Back").size() == 1; }));
+    EXPECT_TRUE(shows("Ideas.md"));
+    press("Back");
+    EXPECT_TRUE(Accessible::waitFor([this] { return !shows("Ideas.md"); }));
+    EXPECT_TRUE(shows("Photos"));
+}
+
+} // namespace
