@@ -78,6 +78,13 @@ struct BroadwayServer::Process {
     ObjectRef<GSubprocess> child;
     std::string socket;
 
+    Process(GSubprocess* started, std::string socketOfDisplay)
+        : child(ObjectRef<GSubprocess>::adopt(started))
+        , socket(std::move(socketOfDisplay))
+    {
+    }
+    Process(const Process&) = delete;
+    Process& operator=(const Process&) = delete;
     ~Process()
     {
         g_subprocess_send_signal(child.get(), SIGTERM);
@@ -108,8 +115,7 @@ std::unique_ptr<BroadwayServer> BroadwayServer::start()
         "127.0.0.1", "--port", portText.c_str(), displayName.c_str(), nullptr);
     if (!child)
         return nullptr;
-    auto process =
-        std::make_unique<Process>(Process{ObjectRef<GSubprocess>::adopt(child), socketPath(*display)});
+    auto process = std::make_unique<Process>(child, socketPath(*display));
     for (int attempt = 0; attempt < startAttempts && !process->hasExited(); ++attempt) {
         if (process->isReady(*port)) {
             g_setenv("GDK_BACKEND", "broadway", TRUE);
