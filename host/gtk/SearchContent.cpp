@@ -2,8 +2,6 @@
 
 #include "platform/Localization.h"
 
-#include <adwaita.h>
-
 namespace host::gtk {
 
 namespace ui = platform::ui;
@@ -54,15 +52,14 @@ SearchContent::~SearchContent()
 
 void SearchContent::buildBar(const ui::SearchPresentation& search)
 {
-    auto* bar = adw_header_bar_new();
-    adw_header_bar_set_show_start_title_buttons(ADW_HEADER_BAR(bar), FALSE);
-    adw_header_bar_set_show_end_title_buttons(ADW_HEADER_BAR(bar), FALSE);
-    adw_header_bar_set_centering_policy(ADW_HEADER_BAR(bar), ADW_CENTERING_POLICY_LOOSE);
+    auto* bar = gtk_box_new(GTK_ORIENTATION_HORIZONTAL, 0);
+    gtk_widget_add_css_class(bar, "kit-search-bar");
     const auto& name = search.placeholder().empty() ? platform::localized("Search") : search.placeholder();
     g_object_set(_entry, "placeholder-text", name.c_str(), "search-delay", 0U, "hexpand", TRUE, nullptr);
     gtk_accessible_update_property(GTK_ACCESSIBLE(_entry), GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
-    adw_header_bar_set_title_widget(ADW_HEADER_BAR(bar), _entry);
-    adw_header_bar_pack_end(ADW_HEADER_BAR(bar), _cancel);
+    gtk_widget_add_css_class(_cancel, "flat");
+    gtk_box_append(GTK_BOX(bar), _entry);
+    gtk_box_append(GTK_BOX(bar), _cancel);
     gtk_box_append(GTK_BOX(widget()), bar);
     const auto cancel = [weak = _search] {
         if (const auto left = weak.lock())
