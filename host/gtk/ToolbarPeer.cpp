@@ -62,6 +62,8 @@ void ToolbarPeer::append(const std::shared_ptr<ui::BarButtonItem>& item, bool vi
 {
     if (!item->isSpace()) {
         _peers.push_back(BarItemPeer::make(_context, item));
+        if (GTK_IS_BUTTON(_peers.back()->widget()))
+            gtk_widget_add_css_class(_peers.back()->widget(), "flat");
         gtk_box_append(GTK_BOX(_box), _peers.back()->widget());
         return;
     }
