@@ -1,5 +1,6 @@
 #include "host/gtk/ListViewPeer.h"
 
+#include "host/gtk/FirstList.h"
 #include "host/gtk/ListRowWidget.h"
 #include "host/gtk/MenuPopover.h"
 #include "host/gtk/RowModel.h"
@@ -246,6 +247,8 @@ void ListViewPeer::refreshRows()
 {
     for (auto* item : _live)
         bindRow(item);
+    if (!_live.empty())
+        noteFirstList(_listWidget);
 }
 
 void ListViewPeer::scrollTo(ui::ScrollView& view, Point offset, bool /*animated*/)
