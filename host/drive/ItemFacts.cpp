@@ -117,7 +117,7 @@ void readPromise(ItemFacts& facts, const std::string& itemPath, int missingReaso
     else
         facts.error = text ? damagedRecord(path, "it does not hold a promise") : *text.error;
     if (facts.error)
-        op.error("Cannot use the promise %@: %@", path, *facts.error);
+        op.error("Cannot use the promise %@: %@", path, reasonOf(*facts.error));
     facts.promisePath = std::move(path);
 }
 

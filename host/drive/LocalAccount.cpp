@@ -1,6 +1,7 @@
 #include "host/drive/LocalAccount.h"
 
 #include "host/drive/AccountRecord.h"
+#include "host/drive/SmallFile.h"
 #include "host/drive/StorageSpace.h"
 #include "platform/Log.h"
 
@@ -11,7 +12,7 @@ std::optional<platform::PropertyValue> LocalAccount::identityToken() const
     static constexpr platform::Operation op{"-[LocalAccount identityToken]"};
     const auto record = AccountRecord::read(_layout);
     if (record.error)
-        op.error("Cannot use the account in %@: %@", _layout.account(), *record.error);
+        op.error("Cannot use the account in %@: %@", _layout.account(), reasonOf(*record.error));
     if (!record)
         return std::nullopt;
     platform::Data token;

@@ -38,9 +38,9 @@ std::uint32_t identifierAt(const DriveLayout& layout, const std::string& relativ
     return promise ? promise->documentIdentifier : 0;
 }
 
-Error unusableBookmark(const std::string& reason)
+Error unusableBookmark(const char* sentence)
 {
-    return cloudError(CloudErrorCode::UnusableBookmark, {}, reason);
+    return cloudError(CloudErrorCode::UnusableBookmark, {}, sentence);
 }
 
 // The document that a bookmark names by its place, unless another document has taken that place.
@@ -70,19 +70,19 @@ Result<Url> findBookmarked(const DriveLayout& layout, const DocumentIndex& index
 {
     const auto bookmark = Bookmark::decode(text);
     if (!bookmark)
-        return unusableBookmark("The bookmark is damaged.");
+        return unusableBookmark("The link to the document is damaged.");
     const auto account = AccountRecord::read(layout);
     if (!account || account->identity != bookmark->account)
-        return unusableBookmark("The bookmark belongs to another account.");
+        return unusableBookmark("The link leads to a document of another account.");
     // The identifier stays with the document when it is moved, so it counts before the place.
     auto found = findDocument(layout, index, bookmark->documentIdentifier);
     if (!found)
         found = documentAtPlace(layout, *bookmark);
     if (!found)
-        return unusableBookmark("The document is no longer in the drive.");
+        return unusableBookmark("The document isn’t in the drive any more.");
     // One wording for what is not there and for what lies elsewhere: nothing is told of the world outside.
     if (!isWithin(*found, layout.documents()))
-        return unusableBookmark("The document is no longer in the drive.");
+        return unusableBookmark("The document isn’t in the drive any more.");
     return *found;
 }
 

@@ -112,8 +112,7 @@ Result<ContainerPointer> LocalContainers::containerForItem(const Url& url) const
 {
     const auto identifier = containerIdentifierInURL(url);
     if (!identifier)
-        return cloudError(
-            CloudErrorCode::UnknownContainer, url.path(), "The item lies in no container of the drive.");
+        return cloudError(CloudErrorCode::UnknownContainer, url.path(), "The item isn’t in the drive.");
     auto found = known(*identifier);
     if (found.damage)
         return *found.damage;
@@ -193,7 +192,7 @@ LocalContainers::Known LocalContainers::read(const std::string& identifier, cons
     else if (!text && !text.error->is(platform::FileErrorCode::NoSuchItem))
         result.damage = *text.error;
     if (result.damage)
-        op.error("Cannot use the description %@ of a container: %@", path, *result.damage);
+        op.error("Cannot use the description %@ of a container: %@", path, reasonOf(*result.damage));
 
     auto container = std::make_shared<DocumentContainer>();
     container->identifier = identifier;

@@ -120,7 +120,8 @@ bool LocalPromisedItems::isExternalDocumentReference(const Url& url) const
 Result<Url> LocalPromisedItems::resolveExternalDocumentReference(const Url& url) const
 {
     if (!isReferenceName(url))
-        return cloudError(CloudErrorCode::DamagedRecord, url.path(), "The item is no reference.");
+        return cloudError(
+            CloudErrorCode::DamagedRecord, url.path(), "The item doesn’t stand for another one.");
     return readReference(url.path(), _layout);
 }
 

@@ -1,6 +1,8 @@
 #include "host/drive/SmallFile.h"
 
 #include "host/system/SystemErrors.h"
+#include "host/system/Translate.h"
+#include "platform/Localization.h"
 
 #include <fcntl.h>
 
@@ -12,6 +14,7 @@ namespace host::drive {
 namespace {
 
 using platform::Error;
+namespace errorKey = platform::errorKey;
 
 // One read; only an interruption by a signal is tried again.
 ssize_t readSome(const host::system::FileDescriptor& file, char* into, std::size_t size)
@@ -30,16 +33,28 @@ Error itemError(int errorNumber, const std::string& path)
     return host::system::systemError(errorNumber == ENOTDIR ? ENOENT : errorNumber, path);
 }
 
-Error cloudError(CloudErrorCode code, const std::string& path, const std::string& reason)
+Error cloudError(CloudErrorCode code, const std::string& path, const char* sentence)
 {
     return Error(platform::errorDomain::cloud, static_cast<int>(code),
-        {{std::string(platform::errorKey::filePath), path},
-            {std::string(platform::errorKey::localizedDescription), reason}});
+        {{std::string(errorKey::filePath), path},
+            {std::string(errorKey::localizedDescription), host::system::translated(sentence)}});
 }
 
 Error damagedRecord(const std::string& path, const std::string& reason)
 {
-    return cloudError(CloudErrorCode::DamagedRecord, path, reason);
+    auto sentence = platform::formatText(
+        host::system::translated("“%@” is damaged and can’t be used."), {host::system::displayName(path)});
+    return Error(platform::errorDomain::cloud, static_cast<int>(CloudErrorCode::DamagedRecord),
+        {{std::string(errorKey::filePath), path},
+            {std::string(errorKey::localizedDescription), std::move(sentence)},
+            {std::string(errorKey::localizedFailureReason), reason}});
+}
+
+std::string reasonOf(const Error& error)
+{
+    if (auto reason = error.text(errorKey::localizedFailureReason))
+        return *reason;
+    return error.text(errorKey::localizedDescription).value_or("it failed");
 }
 
 platform::Result<std::string> readSmallFile(const std::string& path, std::size_t limit)

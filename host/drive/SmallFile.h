@@ -20,10 +20,15 @@ platform::Result<std::string> readSmallFile(
 /// something that is no folder is missing, too.
 platform::Error itemError(int errorNumber, const std::string& path);
 
-/// A record of the drive that cannot be used: the cloud domain, with the reason in plain words.
-platform::Error damagedRecord(const std::string& path, const std::string& reason);
 /// Codes of errorDomain::cloud.
 enum class CloudErrorCode : int { DamagedRecord = 1, OutsideDrive, UnknownContainer, UnusableBookmark };
-platform::Error cloudError(CloudErrorCode code, const std::string& path, const std::string& reason);
+
+/// A record of the drive that cannot be used: the cloud domain, with a sentence for the user and, as the
+/// failure reason, what the log says of it.
+platform::Error damagedRecord(const std::string& path, const std::string& reason);
+/// An error of the cloud domain with a sentence for the user; `sentence` is looked up in the catalogue.
+platform::Error cloudError(CloudErrorCode code, const std::string& path, const char* sentence);
+/// What the log says of an error: its failure reason, else its description.
+std::string reasonOf(const platform::Error& error);
 
 } // namespace host::drive

@@ -1,4 +1,5 @@
 #include "host/drive/AccountRecord.h"
+#include "host/drive/SmallFile.h"
 #include "host/drive/sample/SampleDrive.h"
 #include "host/system/AtomicWrite.h"
 
@@ -7,6 +8,7 @@
 #include <algorithm>
 #include <cerrno>
 #include <cstdio>
+#include <filesystem>
 #include <string>
 #include <vector>
 
@@ -31,9 +33,19 @@ int usage()
 
 int fail(const std::string& what, const platform::Error& error)
 {
-    const auto reason = error.text(platform::errorKey::localizedDescription).value_or("it failed");
-    std::fprintf(stderr, "%s: %s\n", what.c_str(), reason.c_str());
+    std::fprintf(stderr, "%s: %s\n", what.c_str(), host::drive::reasonOf(error).c_str());
     return failed;
+}
+
+/// Makes the drive's home; says why when it cannot be made.
+bool prepareHome(const DriveLayout& layout)
+{
+    layout.prepare();
+    std::error_code error;
+    if (std::filesystem::is_directory(layout.home(), error))
+        return true;
+    std::fprintf(stderr, "The folder %s cannot be made.\n", layout.home().c_str());
+    return false;
 }
 
 std::string shownName(const AccountRecord& record)
@@ -54,6 +66,8 @@ int signIn(const DriveLayout& wanted, const std::string& name)
         std::fputs("A name is a short text without control characters.\n", stderr);
         return wrongUse;
     }
+    if (!prepareHome(wanted))
+        return failed;
     const auto layout = wanted.prepare();
     const auto present = AccountRecord::read(layout);
     const auto identity = host::drive::localIdentity(name);
@@ -102,6 +116,8 @@ int status(const DriveLayout& layout)
 
 int makeSample(const DriveLayout& layout)
 {
+    if (!prepareHome(layout))
+        return failed;
     const auto outcome = host::drive::sample::makeSampleDrive(layout);
     if (outcome.error)
         return fail("Cannot make the sample drive", *outcome.error);
