@@ -19,6 +19,8 @@ constexpr int maximumWrapRounds = 4;
 
 // No length is negative, but a window that is too small is no reason to give up what was asked for.
 constexpr LayoutPriority noNegativeLength = 999.5F;
+// A wanted length whose priority says that it is required.
+constexpr LayoutPriority requiredWish = 999.9F;
 // How strongly a fitting size is kept that was asked for.
 constexpr LayoutPriority targetSize = 999;
 // Smaller differences of lengths are rounding errors.
@@ -31,7 +33,7 @@ using Term = LayoutSolver::Term;
 struct Wish {
     double wanted = LayoutItem::noIntrinsicMetric;
     LayoutPriority hugging = 0, resistance = 0;
-    std::optional<ConstraintId> notLonger, notShorter, notNegative;
+    std::optional<ConstraintId> id, notNegative;
 };
 
 struct PlacedView {
@@ -54,7 +56,6 @@ struct Addition {
     LayoutRule rule;
     LayoutPriority priority;
     std::optional<ConstraintId>* id;
-    bool isHeight = false; ///< a wanted height
 };
 
 } // namespace
@@ -89,7 +90,7 @@ struct LayoutEngine::Impl {
     void removeGoneViews();
     void updateWishes(const View& view, PlacedView& entry);
     void updateWish(LayoutSolver::Variable length, Wish& wish, const View& view, Axis axis);
-    void setWish(std::optional<ConstraintId>& id, const Addition& addition, bool isWanted, bool isKept);
+    void remove(std::optional<ConstraintId>& id);
     void addAll();
     void solve();
     bool updateWrappedHeights();
@@ -139,6 +140,8 @@ void LayoutEngine::Impl::synchronize()
         removeGoneViews();
         wishesAreStale = true;
     }
+    // Before the wishes: most of them then find a length that is still free.
+    addAll();
     if (wishesAreStale) {
         for (const auto& view : tree) {
             if (const auto entry = placed.find(view.get()); entry != placed.end())
@@ -146,7 +149,6 @@ void LayoutEngine::Impl::synchronize()
         }
         wishesAreStale = false;
     }
-    addAll();
 }
 
 void LayoutEngine::Impl::placeViews()
@@ -172,9 +174,7 @@ void LayoutEngine::Impl::placeViews()
 
 void LayoutEngine::Impl::removeRule(ActiveRule& rule)
 {
-    if (rule.id)
-        solver.removeConstraint(*rule.id);
-    rule.id.reset();
+    remove(rule.id);
 }
 
 void LayoutEngine::Impl::synchronizeRules()
@@ -222,7 +222,7 @@ void LayoutEngine::Impl::removeGoneViews()
             return false;
         auto& view = entry.second;
         for (const auto& wish : view.wishes) {
-            for (const auto& id : {wish.notLonger, wish.notShorter, wish.notNegative}) {
+            for (const auto& id : {wish.id, wish.notNegative}) {
                 if (id)
                     solver.removeConstraint(*id);
             }
@@ -248,38 +248,35 @@ void LayoutEngine::Impl::updateWishes(const View& view, PlacedView& entry)
     updateWish(own.height, entry.wishes[1], view, Axis::Vertical);
 }
 
-void LayoutEngine::Impl::updateWish(
-    LayoutSolver::Variable length, Wish& wish, const View& view, Axis axis)
+void LayoutEngine::Impl::updateWish(LayoutSolver::Variable length, Wish& wish, const View& view, Axis axis)
 {
-    const bool isWanted = wish.wanted >= 0;
     const auto hugging = view.hugging(axis), resistance = view.compressionResistance(axis);
-    const LayoutRule notLonger{{{length, 1}}, LayoutRelation::LessThanOrEqual, wish.wanted};
-    const LayoutRule notShorter{{{length, 1}}, LayoutRelation::GreaterThanOrEqual, wish.wanted};
-    const LayoutRule notNegative{{{length, 1}}, LayoutRelation::GreaterThanOrEqual, 0};
-    const bool resists = isWanted && resistance > 0;
-    setWish(wish.notShorter, {notShorter, resistance, &wish.notShorter, axis == Axis::Vertical}, resists,
-        wish.resistance == resistance);
-    setWish(wish.notLonger, {notLonger, hugging, &wish.notLonger, axis == Axis::Vertical}, isWanted && hugging > 0,
-        wish.hugging == hugging);
-    // Of what resists being short nothing more has to be said.
-    setWish(wish.notNegative, {notNegative, noNegativeLength, &wish.notNegative}, !resists, true);
+    const bool isKept = wish.hugging == hugging && wish.resistance == resistance;
     wish.hugging = hugging;
     wish.resistance = resistance;
-}
-
-void LayoutEngine::Impl::setWish(
-    std::optional<ConstraintId>& id, const Addition& addition, bool isWanted, bool isKept)
-{
-    if (id && isWanted && isKept) {
-        solver.setConstant(*id, addition.rule.constant);
+    // Of what resists being short nothing more has to be said.
+    const bool isWanted = wish.wanted >= 0 && (hugging > 0 || resistance > 0);
+    if (isWanted && resistance > 0) {
+        remove(wish.notNegative);
+    } else if (!wish.notNegative) {
+        wish.notNegative = solver.addWish(length, 0, 0, noNegativeLength);
+    }
+    if (wish.id && isWanted && isKept) {
+        solver.setConstant(*wish.id, wish.wanted);
         return;
     }
-    if (id) {
-        solver.removeConstraint(*id);
-        id.reset();
-    }
+    remove(wish.id);
+    // A wish that is required would be in the way of what was asked for in so many words.
+    const auto atMost = [](LayoutPriority priority) { return std::min(priority, requiredWish); };
     if (isWanted)
-        additions.push_back(addition);
+        wish.id = solver.addWish(length, wish.wanted, atMost(hugging), atMost(resistance));
+}
+
+void LayoutEngine::Impl::remove(std::optional<ConstraintId>& id)
+{
+    if (id)
+        solver.removeConstraint(*id);
+    id.reset();
 }
 
 void LayoutEngine::Impl::addAll()
@@ -287,9 +284,7 @@ void LayoutEngine::Impl::addAll()
     static constexpr Operation op{"-[LayoutEngine addAll]"};
     // The important ones first, so that most of the others find their optimum as they come.
     std::stable_sort(additions.begin(), additions.end(),
-        [](const auto& a, const auto& b) {
-            return a.isHeight != b.isHeight ? a.isHeight : a.priority > b.priority;
-        });
+        [](const auto& a, const auto& b) { return a.priority > b.priority; });
     for (const auto& addition : additions) {
         const auto& rule = addition.rule;
         *addition.id = solver.addConstraint(rule.terms, rule.relation, rule.constant, addition.priority);
@@ -340,7 +335,6 @@ bool LayoutEngine::Impl::updateWrappedHeights()
         updateWish(variables.at(view.get()).height, entry.wishes[1], *view, Axis::Vertical);
         isAnother = true;
     }
-    addAll();
     return isAnother;
 }
 

@@ -16,14 +16,20 @@ struct Stored {
     std::vector<LayoutSolver::Term> terms;
     LayoutRelation relation = LayoutRelation::Equal;
     double constant = 0;
-    LayoutPriority priority = LayoutPriorities::required;
+    // A required constraint is never missed; another one may be, upwards and downwards at these priorities. 0
+    // or less: as it likes.
+    bool isRequired = false;
+    LayoutPriority againstMore = 0, againstLess = 0;
     bool inUse = false;
     // The marker stands in this constraint's equation only; so does the second column, if there is one.
     Column marker = 0;
     double markerCoefficient = 0;
     std::optional<Column> other;
 
-    bool isRequired() const { return priority >= LayoutPriorities::required; }
+    LayoutPriority priority() const
+    {
+        return isRequired ? LayoutPriorities::required : std::max(againstMore, againstLess);
+    }
 };
 
 } // namespace
@@ -37,6 +43,7 @@ struct LayoutSolver::Impl {
     std::vector<ConstraintId> givenUp;
     bool costsAreLeast = true;
 
+    std::optional<ConstraintId> add(Stored constraint);
     bool place(Stored& constraint);
     SparseRow markedRow(Stored& constraint);
     std::optional<Column> subject(const SparseRow& row, const Stored& constraint) const;
@@ -47,25 +54,24 @@ struct LayoutSolver::Impl {
     void rebuild();
 };
 
-/// The constraint as an equation 0 = row. A miss and, in an inequality, the slack are columns of their own.
+/// The constraint as an equation 0 = row. The slack of a required inequality is a column of its own; so are
+/// what another constraint has too much (the marker) and too little.
 SparseRow LayoutSolver::Impl::markedRow(Stored& constraint)
 {
     SparseRow row;
     row.constant = -constraint.constant;
     for (const auto& term : constraint.terms)
         tableau.addTo(row, *variables[term.variable], term.coefficient);
-    constraint.other.reset();
-    if (constraint.relation == LayoutRelation::Equal && constraint.isRequired()) {
-        constraint.marker = tableau.addColumn(Kind::Dummy);
-        constraint.markerCoefficient = 1;
-    } else {
-        constraint.marker = tableau.addColumn(Kind::Restricted);
-        constraint.markerCoefficient = constraint.relation == LayoutRelation::LessThanOrEqual ? 1 : -1;
-    }
+    const bool isEquation = constraint.isRequired && constraint.relation == LayoutRelation::Equal;
+    const bool hasUpperSlack =
+        constraint.isRequired && constraint.relation == LayoutRelation::LessThanOrEqual;
+    constraint.marker = tableau.addColumn(isEquation ? Kind::Dummy : Kind::Restricted);
+    constraint.markerCoefficient = hasUpperSlack ? 1 : -1;
     row.add(constraint.marker, constraint.markerCoefficient);
-    if (!constraint.isRequired()) {
+    constraint.other.reset();
+    if (!constraint.isRequired) {
         constraint.other = tableau.addColumn(Kind::Restricted);
-        row.add(*constraint.other, -constraint.markerCoefficient);
+        row.add(*constraint.other, 1);
         addCosts(constraint, 1);
     }
     if (row.constant < 0)
@@ -75,18 +81,24 @@ SparseRow LayoutSolver::Impl::markedRow(Stored& constraint)
 
 void LayoutSolver::Impl::addCosts(const Stored& constraint, double cost)
 {
-    tableau.addCost(*constraint.other, constraint.priority, cost);
-    if (constraint.relation == LayoutRelation::Equal)
-        tableau.addCost(constraint.marker, constraint.priority, cost);
+    if (constraint.againstMore > 0)
+        tableau.addCost(constraint.marker, constraint.againstMore, cost);
+    if (constraint.againstLess > 0)
+        tableau.addCost(*constraint.other, constraint.againstLess, cost);
 }
 
 /// A column that can be basic at once.
 std::optional<Column> LayoutSolver::Impl::subject(const SparseRow& row, const Stored& constraint) const
 {
+    // The free column that stands in the fewest rows: those have to be rewritten.
+    std::optional<Column> free;
     for (const auto& cell : row.cells()) {
-        if (tableau.kind(cell.column) == Kind::Free)
-            return cell.column;
+        if (tableau.kind(cell.column) == Kind::Free
+            && (!free || tableau.occurrenceCount(cell.column) <= tableau.occurrenceCount(*free)))
+            free = cell.column;
     }
+    if (free)
+        return free;
     if (tableau.kind(constraint.marker) == Kind::Restricted && row.coefficient(constraint.marker) < 0)
         return constraint.marker;
     if (constraint.other && row.coefficient(*constraint.other) < 0)
@@ -120,7 +132,7 @@ void LayoutSolver::Impl::unplace(Stored& constraint)
 {
     if (constraint.other)
         addCosts(constraint, -1);
-    tableau.removeEquation(constraint.marker);
+    tableau.removeEquation(constraint.marker, constraint.other);
     tableau.freeColumn(constraint.marker);
     if (constraint.other)
         tableau.freeColumn(*constraint.other);
@@ -155,7 +167,7 @@ void LayoutSolver::Impl::rebuild()
             order.push_back(id);
     }
     std::stable_sort(order.begin(), order.end(),
-        [this](auto a, auto b) { return constraints[a].priority > constraints[b].priority; });
+        [this](auto a, auto b) { return constraints[a].priority() > constraints[b].priority(); });
     for (const auto id : order) {
         if (place(constraints[id]))
             continue;
@@ -196,17 +208,40 @@ void LayoutSolver::removeVariable(Variable variable)
 std::optional<LayoutSolver::ConstraintId> LayoutSolver::addConstraint(
     std::span<const Term> terms, LayoutRelation relation, double constant, LayoutPriority priority)
 {
-    _impl->makeFeasible();
-    Stored constraint{{terms.begin(), terms.end()}, relation, constant, priority, true, 0, 0, {}};
-    if (!_impl->place(constraint))
+    Stored constraint;
+    constraint.terms = {terms.begin(), terms.end()};
+    constraint.relation = relation;
+    constraint.constant = constant;
+    constraint.isRequired = priority >= LayoutPriorities::required;
+    constraint.againstMore = relation == LayoutRelation::GreaterThanOrEqual ? 0 : priority;
+    constraint.againstLess = relation == LayoutRelation::LessThanOrEqual ? 0 : priority;
+    return _impl->add(std::move(constraint));
+}
+
+LayoutSolver::ConstraintId LayoutSolver::addWish(
+    Variable variable, double value, LayoutPriority againstMore, LayoutPriority againstLess)
+{
+    Stored constraint;
+    constraint.terms = {{variable, 1}};
+    constraint.constant = value;
+    constraint.againstMore = againstMore;
+    constraint.againstLess = againstLess;
+    return *_impl->add(std::move(constraint));
+}
+
+std::optional<LayoutSolver::ConstraintId> LayoutSolver::Impl::add(Stored constraint)
+{
+    makeFeasible();
+    constraint.inUse = true;
+    if (!place(constraint))
         return std::nullopt;
-    if (_impl->unusedIds.empty()) {
-        _impl->constraints.push_back(std::move(constraint));
-        return static_cast<ConstraintId>(_impl->constraints.size() - 1);
+    if (unusedIds.empty()) {
+        unusedIds.push_back(static_cast<ConstraintId>(constraints.size()));
+        constraints.emplace_back();
     }
-    const auto id = _impl->unusedIds.back();
-    _impl->unusedIds.pop_back();
-    _impl->constraints[id] = std::move(constraint);
+    const auto id = unusedIds.back();
+    unusedIds.pop_back();
+    constraints[id] = std::move(constraint);
     return id;
 }
 
@@ -231,12 +266,6 @@ void LayoutSolver::setConstant(ConstraintId id, double constant)
     _impl->makeCostsLeast();
     constraint.constant = constant;
     _impl->tableau.shift(constraint.marker, change / constraint.markerCoefficient);
-}
-
-LayoutSolver::ConstraintId LayoutSolver::addEdit(Variable variable, LayoutPriority priority)
-{
-    const Term term{variable, 1};
-    return *addConstraint({&term, 1}, LayoutRelation::Equal, 0, priority);
 }
 
 std::vector<LayoutSolver::ConstraintId> LayoutSolver::solve()

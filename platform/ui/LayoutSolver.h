@@ -39,13 +39,13 @@ public:
     /// required and contradicts what is required already.
     std::optional<ConstraintId> addConstraint(
         std::span<const Term> terms, LayoutRelation relation, double constant, LayoutPriority priority);
+    /// Wishes a value for a variable, with a priority against more and one against less; both are below 1000,
+    /// and 0 or less allows what it is about.
+    ConstraintId addWish(
+        Variable variable, double value, LayoutPriority againstMore, LayoutPriority againstLess);
     void removeConstraint(ConstraintId id);
     /// Takes effect with the next `solve`.
     void setConstant(ConstraintId id, double constant);
-
-    /// Wishes a value for a variable; suggesting another one later is cheap. The priority is below 1000.
-    ConstraintId addEdit(Variable variable, LayoutPriority priority);
-    void suggest(ConstraintId edit, double value) { setConstant(edit, value); }
 
     /// Brings the values up to date. Answers the required constraints that had to be given up, because
     /// constants that were set contradict each other; they are removed, the younger before the older.

@@ -17,12 +17,12 @@ constexpr int maximumPivots = 20000;
 SimplexTableau::Column SimplexTableau::addColumn(Kind kind)
 {
     if (_unusedColumns.empty()) {
-        _columns.push_back({kind, noRow, {}});
+        _columns.push_back({kind, noRow, {}, {}});
         return static_cast<Column>(_columns.size() - 1);
     }
     const Column column = _unusedColumns.back();
     _unusedColumns.pop_back();
-    _columns[column] = {kind, noRow, {}};
+    _columns[column] = {kind, noRow, {}, {}};
     return column;
 }
 
@@ -30,7 +30,9 @@ void SimplexTableau::freeColumn(Column column)
 {
     if (_columns[column].row != noRow)
         removeRow(_columns[column].row);
-    for (const auto row : rowsWith(column))
+    for (const auto row : restrictedRowsWith(column))
+        _rows[row].row.take(column);
+    for (const auto row : freeRowsWith(column))
         _rows[row].row.take(column);
     for (auto& [priority, level] : _levels)
         level.take(column);
@@ -40,17 +42,41 @@ void SimplexTableau::freeColumn(Column column)
 
 double SimplexTableau::value(Column column) const
 {
-    const auto row = _columns[column].row;
-    return row == noRow ? 0 : _rows[row].row.constant;
+    const auto index = _columns[column].row;
+    if (index == noRow)
+        return 0;
+    const auto& row = _rows[index].row;
+    double value = row.constant;
+    if (kind(column) == Kind::Free) {
+        for (const auto& cell : row.cells()) {
+            if (const auto inner = _columns[cell.column].row; inner != noRow)
+                value += cell.coefficient * _rows[inner].row.constant;
+        }
+    }
+    return value;
 }
 
-void SimplexTableau::addTo(SparseRow& expression, Column column, double factor) const
+void SimplexTableau::addTo(SparseRow& expression, Column column, double factor)
 {
     const auto row = _columns[column].row;
-    if (row == noRow)
+    if (row == noRow) {
         expression.add(column, factor);
-    else
-        expression.addScaled(_rows[row].row, factor, [](Column) {});
+        return;
+    }
+    if (kind(column) == Kind::Free)
+        bringUpToDate(row);
+    expression.addScaled(_rows[row].row, factor, [](Column) {});
+}
+
+/// Replaces the restricted columns of a free column's row that have become basic.
+void SimplexTableau::bringUpToDate(std::int32_t index)
+{
+    auto& row = _rows[index].row;
+    const auto isBasic = [this](const auto& cell) { return _columns[cell.column].row != noRow; };
+    const auto& cells = row.cells();
+    for (auto cell = std::find_if(cells.begin(), cells.end(), isBasic); cell != cells.end();
+         cell = std::find_if(cells.begin(), cells.end(), isBasic))
+        substitute(index, cell->column, _rows[_columns[cell->column].row].row);
 }
 
 void SimplexTableau::addCost(Column column, LayoutPriority priority, double cost)
@@ -58,18 +84,36 @@ void SimplexTableau::addCost(Column column, LayoutPriority priority, double cost
     addTo(_levels[priority], column, cost);
 }
 
-const std::vector<std::int32_t>& SimplexTableau::rowsWith(Column column)
+/// The rows that the column does stand in, each once.
+const std::vector<std::int32_t>& SimplexTableau::weeded(
+    Column column, std::vector<std::int32_t>& rows, bool restricted)
 {
-    auto& occurrences = _columns[column].occurrences;
     ++_stamp;
-    std::erase_if(occurrences, [&](std::int32_t index) {
+    std::erase_if(rows, [&](std::int32_t index) {
         auto& row = _rows[index];
-        if (!row.inUse || row.stamp == _stamp || row.row.coefficient(column) == 0)
+        // A place among the rows may have come to hold a row of the other kind.
+        if (!row.inUse || isRestricted(index) != restricted || row.stamp == _stamp
+            || row.row.coefficient(column) == 0)
             return true;
         row.stamp = _stamp;
         return false;
     });
-    return occurrences;
+    return rows;
+}
+
+const std::vector<std::int32_t>& SimplexTableau::restrictedRowsWith(Column column)
+{
+    return weeded(column, _columns[column].inRestrictedRows, true);
+}
+
+const std::vector<std::int32_t>& SimplexTableau::freeRowsWith(Column column)
+{
+    return weeded(column, _columns[column].inFreeRows, false);
+}
+
+std::vector<std::int32_t>& SimplexTableau::occurrences(Column column, std::int32_t row)
+{
+    return isRestricted(row) ? _columns[column].inRestrictedRows : _columns[column].inFreeRows;
 }
 
 std::int32_t SimplexTableau::insertRow(Column basic, SparseRow row)
@@ -80,9 +124,9 @@ std::int32_t SimplexTableau::insertRow(Column basic, SparseRow row)
     }
     const auto index = _unusedRows.back();
     _unusedRows.pop_back();
-    for (const auto& cell : row.cells())
-        _columns[cell.column].occurrences.push_back(index);
     _rows[index] = {basic, true, 0, std::move(row)};
+    for (const auto& cell : _rows[index].row.cells())
+        occurrences(cell.column, index).push_back(index);
     _columns[basic].row = index;
     return index;
 }
@@ -96,23 +140,37 @@ SparseRow SimplexTableau::removeRow(std::int32_t index)
     return std::move(_rows[index].row);
 }
 
-void SimplexTableau::substitute(Column column, const SparseRow& replacement)
+void SimplexTableau::substitute(std::int32_t index, Column column, const SparseRow& replacement)
 {
-    for (const auto index : rowsWith(column)) {
-        auto& row = _rows[index].row;
-        const double factor = row.take(column);
-        row.addScaled(
-            replacement, factor, [&](Column added) { _columns[added].occurrences.push_back(index); });
-        if (row.constant < 0 && isRestricted(index)) {
-            if (row.constant > -SparseRow::epsilon)
-                row.constant = 0;
-            else
-                _infeasible.push_back(index);
-        }
+    auto& row = _rows[index].row;
+    const double factor = row.take(column);
+    row.addScaled(replacement, factor, [&](Column added) { occurrences(added, index).push_back(index); });
+}
+
+void SimplexTableau::substituteInRestrictedRows(Column column, const SparseRow& replacement)
+{
+    for (const auto index : restrictedRowsWith(column)) {
+        substitute(index, column, replacement);
+        auto& constant = _rows[index].row.constant;
+        if (constant >= 0)
+            continue;
+        if (constant > -SparseRow::epsilon)
+            constant = 0;
+        else
+            _infeasible.push_back(index);
     }
-    _columns[column].occurrences.clear();
-    if (kind(column) == Kind::Free)
-        return; // stands in no objective
+    _columns[column].inRestrictedRows.clear();
+}
+
+void SimplexTableau::substituteInFreeRows(Column column, const SparseRow& replacement)
+{
+    for (const auto index : freeRowsWith(column))
+        substitute(index, column, replacement);
+    _columns[column].inFreeRows.clear();
+}
+
+void SimplexTableau::substituteInCosts(Column column, const SparseRow& replacement)
+{
     for (auto& [priority, level] : _levels) {
         if (const double factor = level.take(column); factor != 0)
             level.addScaled(replacement, factor, [](Column) {});
@@ -122,16 +180,25 @@ void SimplexTableau::substitute(Column column, const SparseRow& replacement)
 void SimplexTableau::pivot(std::int32_t index, Column entering)
 {
     const Column leaving = _rows[index].basic;
+    if (kind(leaving) == Kind::Free)
+        bringUpToDate(index);
     SparseRow row = removeRow(index);
     row.solveFor(leaving, entering);
-    substitute(entering, row);
+    substituteInRestrictedRows(entering, row);
+    // What names a free column again must not hide behind a basic column.
+    if (kind(leaving) == Kind::Free)
+        substituteInFreeRows(entering, row);
+    substituteInCosts(entering, row);
     insertRow(entering, std::move(row));
 }
 
 void SimplexTableau::addEquation(SparseRow row, Column subject)
 {
     row.solveFor(subject);
-    substitute(subject, row);
+    if (kind(subject) == Kind::Free)
+        substituteInFreeRows(subject, row);
+    else
+        substituteInCosts(subject, row);
     insertRow(subject, std::move(row));
 }
 
@@ -161,7 +228,7 @@ bool SimplexTableau::addEquation(SparseRow row)
     return true;
 }
 
-void SimplexTableau::removeEquation(Column marker)
+void SimplexTableau::removeEquation(Column marker, std::optional<Column> other)
 {
     if (_columns[marker].row == noRow) {
         const auto row = rowForMarker(marker);
@@ -169,20 +236,27 @@ void SimplexTableau::removeEquation(Column marker)
             return;
         pivot(row, marker);
     }
+    // The equation is the only one that joins the two columns, so with the marker both leave every other row.
+    const auto behind = freeRowsWith(marker);
+    for (const auto row : behind)
+        bringUpToDate(row);
+    if (other) {
+        const auto beside = freeRowsWith(*other);
+        for (const auto row : beside)
+            bringUpToDate(row);
+    }
     removeRow(_columns[marker].row);
 }
 
 /// The row through which a marker can become basic without making other rows negative.
 std::int32_t SimplexTableau::rowForMarker(Column marker)
 {
-    std::int32_t falling = noRow, rising = noRow, freeRow = noRow;
+    std::int32_t falling = noRow, rising = noRow;
     double leastFalling = std::numeric_limits<double>::max(), leastRising = leastFalling;
-    for (const auto index : rowsWith(marker)) {
+    for (const auto index : restrictedRowsWith(marker)) {
         const auto& row = _rows[index].row;
         const double coefficient = row.coefficient(marker);
-        if (!isRestricted(index)) {
-            freeRow = index;
-        } else if (coefficient < 0 && -row.constant / coefficient < leastFalling) {
+        if (coefficient < 0 && -row.constant / coefficient < leastFalling) {
             leastFalling = -row.constant / coefficient;
             falling = index;
         } else if (coefficient > 0 && row.constant / coefficient < leastRising) {
@@ -190,7 +264,10 @@ std::int32_t SimplexTableau::rowForMarker(Column marker)
             rising = index;
         }
     }
-    return falling != noRow ? falling : rising != noRow ? rising : freeRow;
+    if (falling != noRow || rising != noRow)
+        return falling != noRow ? falling : rising;
+    const auto& freeRows = freeRowsWith(marker);
+    return freeRows.empty() ? noRow : freeRows.front();
 }
 
 void SimplexTableau::shift(Column marker, double amount)
@@ -201,13 +278,15 @@ void SimplexTableau::shift(Column marker, double amount)
         if (SparseRow::isNearZero(row.row.constant))
             row.row.constant = 0;
         const bool isWrong = kind(row.basic) == Kind::Dummy ? row.row.constant != 0 : row.row.constant < 0;
-        if (isRestricted(index) && isWrong)
+        if (isWrong)
             _infeasible.push_back(index);
     };
     if (_columns[marker].row != noRow)
         adjust(_columns[marker].row, amount);
-    for (const auto index : rowsWith(marker))
+    for (const auto index : restrictedRowsWith(marker))
         adjust(index, -amount * _rows[index].row.coefficient(marker));
+    for (const auto index : freeRowsWith(marker))
+        _rows[index].row.constant -= amount * _rows[index].row.coefficient(marker);
 }
 
 void SimplexTableau::minimize()
@@ -253,12 +332,11 @@ std::int32_t SimplexTableau::leavingRow(Column entering)
 {
     std::int32_t found = noRow;
     double least = std::numeric_limits<double>::max();
-    for (const auto index : rowsWith(entering)) {
+    for (const auto index : restrictedRowsWith(entering)) {
         const auto& row = _rows[index].row;
         const double coefficient = row.coefficient(entering);
         // A basic dummy may neither grow nor shrink.
-        const bool blocks = kind(_rows[index].basic) == Kind::Dummy || coefficient < 0;
-        if (!isRestricted(index) || !blocks)
+        if (coefficient > 0 && kind(_rows[index].basic) != Kind::Dummy)
             continue;
         const double ratio = std::abs(row.constant / coefficient);
         // Among equals the lowest column leaves, or degenerate pivots could go round in circles.

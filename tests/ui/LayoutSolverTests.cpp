@@ -82,9 +82,9 @@ TEST(LayoutSolver, RefusesAContradictionAndGoesOnAsBefore)
     add(solver, {{{b, 1}, {a, -1}}, Equal, 0, required});
     EXPECT_FALSE(add(solver, {{{b, 1}}, GreaterThanOrEqual, 101, required}));
     EXPECT_FALSE(add(solver, {{{b, 1}, {a, -1}}, Equal, 5, required}));
-    const auto wish = solver.addEdit(b, 500);
+    const auto wish = solver.addWish(b, 0, 500, 500);
     for (const auto& [wished, got] : {std::pair{60.0, 60.0}, {200.0, 100.0}, {-7.0, -7.0}}) {
-        solver.suggest(wish, wished);
+        solver.setConstant(wish, wished);
         EXPECT_TRUE(solver.solve().empty());
         EXPECT_DOUBLE_EQ(solver.value(a), got);
     }
