@@ -178,6 +178,16 @@ TEST_F(CloudItemTests, anyOtherTextIsNoBookmark)
              std::string("+/+/"), std::string(Bookmark::maximumLength + 1, 'A'), std::string(4'000'000, 'e')})
         EXPECT_TRUE(decode(text).error) << text.substr(0, 60);
 
+    for (std::size_t at = 0; at < whole.size(); ++at) {
+        auto changed = whole;
+        changed[at] = changed[at] == 'A' ? 'B' : 'A';
+        const auto bookmark = Bookmark::decode(changed);
+        EXPECT_NE(bookmark, _bookmark) << at;
+        if (bookmark) {
+            EXPECT_EQ(Bookmark::decode(bookmark->encoded()), bookmark) << at;
+        }
+    }
+
     auto damaged = _bookmark;
     for (const char* path : {"", "..", "../a", "a/../b", "/etc/passwd", "a//b", "."}) {
         damaged.path = path;

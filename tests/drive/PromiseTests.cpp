@@ -82,6 +82,20 @@ TEST(PromiseRecordTests, onlyOneWholeObjectIsARecord)
         EXPECT_FALSE(PromiseRecord::parse(text)) << text.substr(0, 60);
 }
 
+TEST(PromiseRecordTests, aChangedByteNeverYieldsMoreThanARecord)
+{
+    const auto whole = wholeRecord().toJson();
+    for (std::size_t at = 0; at < whole.size(); ++at) {
+        for (const unsigned char byte : {0x00, 0x22, 0x2c, 0x30, 0x5b, 0x5c, 0x7b, 0x7d, 0x80, 0xf4, 0xff}) {
+            auto text = whole;
+            text[at] = static_cast<char>(byte);
+            if (const auto record = PromiseRecord::parse(text)) {
+                EXPECT_EQ(PromiseRecord::parse(record->toJson()), record) << at << ' ' << int{byte};
+            }
+        }
+    }
+}
+
 TEST(PromiseRecordTests, aFieldThatCannotBeRightIsUnknown)
 {
     for (const char* size : {"-1", "1e400", "2.5", "99999999999999999999", "\"12\"", "null", "[1,[2]]"}) {
