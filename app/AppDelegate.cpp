@@ -114,7 +114,12 @@ bool AppDelegate::applicationDidFinishLaunchingWithOptions(Application&, const p
     return true;
 }
 
-void AppDelegate::applicationWillResignActive(Application&) { }
+void AppDelegate::applicationWillResignActive(Application&)
+{
+    dumpWindowInfo();
+}
+
+void AppDelegate::dumpWindowInfo() const { }
 
 bool AppDelegate::applicationShouldSaveApplicationState(Application&, platform::StateCoder&)
 {

@@ -49,6 +49,8 @@ private:
     /// The window's root when it is the browser; else null, and nothing is led anywhere.
     std::shared_ptr<NavController> browser() const;
     bool isSignedIn() const;
+    /// A hook for diagnosis while the application goes to the back; it does nothing.
+    void dumpWindowInfo() const;
     bool warpTo(const std::optional<platform::Url>& url, int previewMode);
     void warpLater(const platform::Url& url);
     void openRecentDocument(const platform::PropertyDictionary& information);

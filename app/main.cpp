@@ -30,6 +30,7 @@ namespace {
 
 using host::drive::DriveLayout;
 using host::drive::LocalCloudDocumentService;
+using host::system::UserLocale;
 using platform::ServiceSet;
 
 /// The program's own file, also when it was started by its bare name.
@@ -50,9 +51,8 @@ std::string localeFolder(const std::filesystem::path& executable)
 }
 
 /// What needs nothing of the drive.
-ServiceSet systemServices(const std::string& executable)
+ServiceSet systemServices(const std::string& executable, const UserLocale& locale)
 {
-    const auto locale = host::system::UserLocale::fromEnvironment();
     ServiceSet set;
     set.localization = std::make_shared<host::system::GettextLocalization>(localeFolder(executable), locale);
     set.formatters = std::make_shared<host::system::IcuFormatters>(locale.formats);
@@ -73,10 +73,11 @@ ServiceSet systemServices(const std::string& executable)
 }
 
 /// Adds what stands on the drive's folder; answers where the drive lies.
-DriveLayout addDriveServices(ServiceSet& set)
+DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale)
 {
     const auto cloud = LocalCloudDocumentService::create(DriveLayout::fromEnvironment(),
-        {set.dispatch, set.notificationCenter, set.typeRegistry, set.localization, set.linkOpener});
+        {set.dispatch, set.notificationCenter, set.typeRegistry, set.localization, set.linkOpener},
+        {.languages = locale.languageList()});
     set.cloudDocumentService = cloud;
     set.storageOfferManager = cloud->storageOffers();
     set.userDefaults =
@@ -95,15 +96,17 @@ int main(int argc, char** argv)
     op.info("Running %s", executable);
     op.info("Built (main) on " __DATE__ " @ " __TIME__);
 
-    auto set = systemServices(executable);
-    const auto layout = addDriveServices(set);
+    // Read once: the message catalogues' set-up changes the variables that it comes from.
+    const auto locale = UserLocale::fromEnvironment();
+    auto set = systemServices(executable, locale);
+    const auto layout = addDriveServices(set, locale);
     // The queues end last: everything else may still hand them work while it ends.
     const auto dispatch = set.dispatch;
     platform::installServices(std::move(set));
     tarrow::FileUtils::logFileAttributes(executable);
 
-    auto application
-        = host::gtk::makeApplication({.version = TRW_VERSION, .stateFile = layout.interfaceState()});
+    auto application =
+        host::gtk::makeApplication({.version = TRW_VERSION, .stateFile = layout.interfaceState()});
     const int status = application->run(argc, argv, [] { return std::make_shared<tarrow::AppDelegate>(); });
     application.reset();
     platform::installServices({});

@@ -17,18 +17,13 @@ class LocalCloudDocumentService : public platform::CloudDocumentService,
                                   public platform::SecurityScopedAccess {
 public:
     struct Settings {
-        std::vector<std::string> languages = userLanguages(); ///< for the containers' names
+        std::vector<std::string> languages; ///< for the containers' names, the preferred one first
         std::string thumbnailFolder = ThumbnailCache::sharedFolder();
     };
 
     /// Makes the drive's home folder when it is missing, and begins to watch the account.
     static std::shared_ptr<LocalCloudDocumentService> create(
         const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings);
-    static std::shared_ptr<LocalCloudDocumentService> create(
-        const DriveLayout& layout, const DriveDependencies& dependencies)
-    {
-        return create(layout, dependencies, Settings());
-    }
 
     const DriveLayout& layout() const { return _layout; }
     /// The account's storage offer; it follows the same file.

@@ -2,7 +2,6 @@
 
 #include "host/drive/SmallFile.h"
 #include "host/system/DirectoryReader.h"
-#include "host/system/UserLocale.h"
 #include "platform/Log.h"
 
 #include <fcntl.h>
@@ -40,18 +39,6 @@ std::string sortKey(const std::string& name)
 }
 
 } // namespace
-
-std::vector<std::string> userLanguages()
-{
-    std::vector<std::string> languages;
-    const auto list = host::system::UserLocale::fromEnvironment().languages;
-    for (std::size_t begin = 0; begin <= list.size();) {
-        const auto end = std::min(list.find(':', begin), list.size());
-        languages.push_back(list.substr(begin, end - begin));
-        begin = end + 1;
-    }
-    return languages;
-}
 
 LocalContainers::LocalContainers(DriveLayout layout, std::vector<std::string> languages)
     : _layout(std::move(layout))

@@ -56,7 +56,4 @@ private:
     mutable std::map<std::string, Known> _known;
 };
 
-/// The user's languages, the preferred one first, as the environment names them.
-std::vector<std::string> userLanguages();
-
 } // namespace host::drive

@@ -1,5 +1,6 @@
 #include "host/system/UserLocale.h"
 
+#include <algorithm>
 #include <cstdlib>
 #include <initializer_list>
 
@@ -38,6 +39,17 @@ UserLocale UserLocale::fromEnvironment()
         locale.languages += ":en";
     locale.formats = formats.empty() ? "en_US" : formats;
     return locale;
+}
+
+std::vector<std::string> UserLocale::languageList() const
+{
+    std::vector<std::string> list;
+    for (std::size_t begin = 0; begin <= languages.size();) {
+        const auto end = std::min(languages.find(':', begin), languages.size());
+        list.push_back(languages.substr(begin, end - begin));
+        begin = end + 1;
+    }
+    return list;
 }
 
 } // namespace host::system

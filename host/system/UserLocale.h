@@ -1,6 +1,7 @@
 #pragma once
 
 #include <string>
+#include <vector>
 
 namespace host::system {
 
@@ -14,6 +15,9 @@ struct UserLocale {
     /// Reads LANGUAGE, LC_ALL, LC_MESSAGES, LC_TIME, LC_COLLATE and LANG as the C library does. Where nothing
     /// or only the "C" locale is asked for, the answer is English.
     static UserLocale fromEnvironment();
+
+    /// `languages`, each by itself.
+    std::vector<std::string> languageList() const;
 };
 
 } // namespace host::system

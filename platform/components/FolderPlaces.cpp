@@ -35,12 +35,11 @@ std::optional<Url> rootFolder()
 
 std::string folderTitle(const Url& folder)
 {
-    if (containers().isContainerTopFolder(folder)) {
-        const auto container = containers().containerForItem(folder);
-        if (container && *container && !(*container)->localizedName.empty())
-            return (*container)->localizedName;
-    }
-    return displayName(folder.lastPathComponent());
+    constexpr AttributeKey key[] = {AttributeKey::LocalizedName};
+    const auto values =
+        services().cloudDocumentService().promisedItems().promisedItemResourceValues(folder, key);
+    const auto* name = values ? values->get<std::string>(AttributeKey::LocalizedName) : nullptr;
+    return name && !name->empty() ? *name : displayName(folder.lastPathComponent());
 }
 
 std::vector<FolderSnapshot::ExtraItem> extraItemsOf(const Url& folder)

@@ -64,6 +64,7 @@ TEST_F(LocaleTest, ReadsTheUsersLocaleAsTheCLibraryDoes)
     ::setenv("LANGUAGE", "fr:en:de", 1);
     ::setenv("LC_TIME", "ar_EG.UTF-8@x", 1);
     EXPECT_EQ(UserLocale::fromEnvironment().languages, "fr:en:de");
+    EXPECT_EQ(UserLocale::fromEnvironment().languageList(), (std::vector<std::string>{"fr", "en", "de"}));
     EXPECT_EQ(UserLocale::fromEnvironment().formats, "ar_EG");
     ::setenv("LC_ALL", "C.UTF-8", 1);
     EXPECT_EQ(UserLocale::fromEnvironment().languages, "en");
