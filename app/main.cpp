@@ -80,6 +80,7 @@ DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale)
         {.languages = locale.languageList()});
     set.cloudDocumentService = cloud;
     set.storageOfferManager = cloud->storageOffers();
+    set.keyValueStore = cloud->keyValueStore();
     set.userDefaults =
         std::make_shared<host::system::JsonUserDefaults>(cloud->layout().defaults(), *set.dispatch);
     return cloud->layout();

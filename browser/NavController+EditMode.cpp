@@ -2,6 +2,7 @@
 
 #include "browser/ListLogging.h"
 #include "browser/NavController.h"
+#include "drawing/FileTags.h"
 #include "platform/Formatters.h"
 #include "platform/Localization.h"
 #include "platform/Log.h"
@@ -73,6 +74,18 @@ std::string NavController::quotaAvailableString() const
     const auto text = formatters.byteCount(_quotaBytes, ByteCountStyle::Binary, ByteCountUnit::Included);
     const double number = formatters.byteCountNumber(_quotaBytes, ByteCountStyle::Binary);
     return platform::localizedPlural(".DICT.AVAILABLE.%g", {number, text});
+}
+
+std::vector<platform::Color> NavController::documentListControllerColorsForTagNames(
+    const List&, const std::vector<std::string>& names)
+{
+    const auto colors = FileTags::tagColorsByTag();
+    std::vector<platform::Color> dots;
+    for (const auto& name : names) {
+        if (const auto found = colors.find(name); found != colors.end())
+            dots.push_back(found->second);
+    }
+    return dots;
 }
 
 } // namespace tarrow

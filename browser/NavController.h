@@ -125,6 +125,8 @@ public:
     void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,
         const platform::Url& url, const std::shared_ptr<platform::ui::View>& originatingView,
         const Completion& completion) override;
+    std::vector<platform::Color> documentListControllerColorsForTagNames(
+        const List& list, const std::vector<std::string>& names) override;
 
 private:
     std::shared_ptr<NavController> self();

@@ -9,6 +9,7 @@
 #include "platform/FolderLister.h"
 #include "platform/Formatters.h"
 #include "platform/ImageLoader.h"
+#include "platform/KeyValueStore.h"
 #include "platform/LinkOpener.h"
 #include "platform/Localization.h"
 #include "platform/NotificationCenter.h"

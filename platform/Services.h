@@ -12,6 +12,7 @@ class FileSystem;
 class FolderLister;
 class Formatters;
 class ImageLoader;
+class KeyValueStore;
 class KeyedArchiver;
 class LinkOpener;
 class Localization;
@@ -31,6 +32,7 @@ struct ServiceSet {
     std::shared_ptr<FolderLister> folderLister;
     std::shared_ptr<Formatters> formatters;
     std::shared_ptr<ImageLoader> imageLoader;
+    std::shared_ptr<KeyValueStore> keyValueStore;
     std::shared_ptr<KeyedArchiver> keyedArchiver;
     std::shared_ptr<LinkOpener> linkOpener;
     std::shared_ptr<Localization> localization;
@@ -57,6 +59,7 @@ public:
     FolderLister& folderLister() const { return *_set.folderLister; }
     Formatters& formatters() const { return *_set.formatters; }
     ImageLoader& imageLoader() const { return *_set.imageLoader; }
+    KeyValueStore& keyValueStore() const { return *_set.keyValueStore; }
     KeyedArchiver& keyedArchiver() const { return *_set.keyedArchiver; }
     LinkOpener& linkOpener() const { return *_set.linkOpener; }
     Localization& localization() const { return *_set.localization; }

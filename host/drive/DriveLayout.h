@@ -26,7 +26,7 @@ public:
     const std::string& trash() const { return _trash; }
     const std::string& containers() const { return _containers; } ///< the containers' descriptions
     std::string account() const { return _home + '/' + std::string(accountFileName); }
-    std::string keyValueStore() const { return _home + "/keyvalue.json"; }
+    std::string keyValueStore() const { return _home + '/' + std::string(keyValueFileName); }
     std::string index() const { return _home + "/index.sqlite"; } ///< document identifiers
     std::string cloud() const { return _home + "/cloud"; } ///< contents of what is not downloaded
     /// What the application keeps between runs: defaults and saved interface state.
@@ -49,6 +49,7 @@ public:
     DriveLayout prepare() const;
 
     static constexpr std::string_view accountFileName = "account.json";
+    static constexpr std::string_view keyValueFileName = "keyvalue.json";
 
 private:
     DriveLayout() = default;

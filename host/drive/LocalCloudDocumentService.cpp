@@ -20,6 +20,7 @@ LocalCloudDocumentService::LocalCloudDocumentService(
           ThumbnailCache::create(settings.thumbnailFolder, dependencies.dispatch))
     , _items(layout, dependencies.dispatch)
     , _storageOffers(LocalStorageOfferManager::create(layout, dependencies))
+    , _keyValueStore(LocalKeyValueStore::create(layout, dependencies))
     , _monitor(AccountMonitor::start(layout, dependencies))
 {
     _monitor->onFileChanged([weak = std::weak_ptr(_storageOffers)] {

@@ -5,6 +5,7 @@
 #include "host/drive/LocalAccount.h"
 #include "host/drive/LocalCloudItems.h"
 #include "host/drive/LocalContainers.h"
+#include "host/drive/LocalKeyValueStore.h"
 #include "host/drive/LocalPromisedItems.h"
 #include "host/drive/LocalStorageOfferManager.h"
 #include "host/drive/ThumbnailCache.h"
@@ -28,6 +29,8 @@ public:
     const DriveLayout& layout() const { return _layout; }
     /// The account's storage offer; it follows the same file.
     const std::shared_ptr<LocalStorageOfferManager>& storageOffers() const { return _storageOffers; }
+    /// The values that the account's devices share.
+    const std::shared_ptr<LocalKeyValueStore>& keyValueStore() const { return _keyValueStore; }
 
     platform::CloudAccount& account() override { return _account; }
     platform::PromisedItems& promisedItems() override { return _promisedItems; }
@@ -49,6 +52,7 @@ private:
     LocalPromisedItems _promisedItems;
     LocalCloudItems _items;
     std::shared_ptr<LocalStorageOfferManager> _storageOffers;
+    std::shared_ptr<LocalKeyValueStore> _keyValueStore;
     std::shared_ptr<AccountMonitor> _monitor;
 };
 

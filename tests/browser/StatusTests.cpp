@@ -1,4 +1,5 @@
 #include "browser/NavController.h"
+#include "drawing/FileTags.h"
 #include "platform/components/DocumentListController.h"
 #include "platform/components/StorageUpgradeButton.h"
 #include "platform/components/UpgradeFlow.h"
@@ -8,6 +9,8 @@
 #include "tests/browser/support/BrowserFixture.h"
 
 #include <gmock/gmock.h>
+
+#include <fstream>
 
 namespace tarrow {
 namespace {
@@ -51,6 +54,17 @@ TEST_F(StatusTest, NumbersChooseTheirWords)
     for (const std::size_t count : {0, 1, 2, 1000})
         EXPECT_THAT(browser->toolbarStatusText(count), testing::StartsWith(itemsText(count))) << count;
     EXPECT_EQ(itemsText(1).find("items"), std::string::npos) << "one item is no items";
+}
+
+TEST_F(StatusTest, TagsHaveTheColorsOfTheSharedTable)
+{
+    std::ofstream(drive.layout().keyValueStore()) << R"({"PathwellTagDict": {"PathwellTagDictVersion": 2,
+        "PathwellTags": [{"n": "Work", "l": 6}, {"n": "Plain"}]}})";
+    FileTags::_tagColorsDidChange();
+    launch();
+    const auto& colors = FileTags::_tagBlipColors();
+    EXPECT_THAT(browser->documentListControllerColorsForTagNames(topList(), {"Plain", "Unknown", "Work"}),
+        testing::ElementsAre(colors[0], colors[6]));
 }
 
 TEST_F(StatusTest, TheLineFollowsTheFolder)

@@ -81,6 +81,7 @@ DriveFixture::DriveFixture()
         layout, dependencies, {{"en"}, _folder.at("thumbnails")});
     set.cloudDocumentService = cloud;
     set.storageOfferManager = cloud->storageOffers();
+    set.keyValueStore = cloud->keyValueStore();
     platform::installServices(std::move(set));
 }
 

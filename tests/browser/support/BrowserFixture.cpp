@@ -45,6 +45,7 @@ BrowserFixture::BrowserFixture()
     set.fileSystem = borrowed(_driveServices.fileSystem());
     set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(drive.dispatch, types, "en_US");
     set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
+    set.keyValueStore = borrowed(_driveServices.keyValueStore());
     set.keyedArchiver = borrowed(_driveServices.keyedArchiver());
     set.localization = englishTexts();
     set.notificationCenter = drive.notifications;

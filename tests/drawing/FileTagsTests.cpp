@@ -1,0 +1,77 @@
+#include "drawing/FileTags.h"
+#include "platform/Log.h"
+#include "platform/NotificationCenter.h"
+#include "tests/support/DriveFixture.h"
+
+#include <gmock/gmock.h>
+
+#include <cstdio>
+#include <fstream>
+
+namespace tarrow {
+namespace {
+
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+class FileTagsTest : public testing::Test {
+protected:
+    /// Replaces the store as another program does, and lets the change be heard.
+    void store(const std::string& json)
+    {
+        const auto path = drive.layout().keyValueStore(), beside = path + ".new";
+        std::ofstream(beside) << json;
+        ASSERT_EQ(std::rename(beside.c_str(), path.c_str()), 0);
+        drive.settle();
+    }
+    void storeTags(const std::string& entries, int version = 2)
+    {
+        store(R"({"PathwellTagDict": {"PathwellTagDictVersion": )" + std::to_string(version)
+            + R"(, "PathwellTags": [)" + entries + "]}}");
+    }
+
+    testing_support::DriveFixture drive;
+    const std::string emptyLine = "WARNING Pathwell tag dictionary is empty";
+};
+
+// The table is kept for the life of the process, so this is one story.
+TEST_F(FileTagsTest, TheTableFollowsTheStore)
+{
+    const auto& colors = FileTags::_tagBlipColors();
+    FileTags::_tagColorsDidChange();
+    EXPECT_THAT(FileTags::allTags(), IsEmpty());
+    EXPECT_GE(drive.log->count(emptyLine), 1U);
+
+    storeTags(R"({"n": "Work", "l": 2}, {"n": "Home"}, {"n": "Work", "l": 6}, {"n": "Far", "l": 9},
+        {"n": "Odd", "l": -1}, {"l": 3}, {"n": 4}, "Loose", {"n": "", "l": 7})");
+    EXPECT_THAT(FileTags::allTags(), ElementsAre("Work", "Home", "Work", "Far", "Odd", ""));
+    auto byTag = FileTags::tagColorsByTag();
+    EXPECT_EQ(byTag.at("Work"), colors[6]);
+    EXPECT_EQ(byTag.at("Home"), colors[0]);
+    EXPECT_EQ(byTag.at("Far"), colors[0]);
+    EXPECT_EQ(byTag.at("Odd"), colors[0]);
+    EXPECT_EQ(byTag.at(""), colors[7]);
+
+    drive.log->clear();
+    storeTags(R"({"n": "Work", "l": 2})", 1);
+    EXPECT_THAT(FileTags::allTags(), IsEmpty());
+    EXPECT_THAT(FileTags::tagColorsByTag(), IsEmpty());
+    EXPECT_THAT(drive.log->lines(),
+        ElementsAre("DEBUG Pathwell tag dictionary has incorrect version (1, should be 2)", emptyLine));
+
+    storeTags(R"({"n": "Work", "l": 2})");
+    EXPECT_EQ(FileTags::tagColorsByTag().at("Work"), colors[2]);
+    drive.log->clear();
+    store(R"({"PathwellTagDict": )");
+    EXPECT_THAT(FileTags::allTags(), IsEmpty());
+    EXPECT_THAT(drive.log->lines(),
+        ElementsAre(
+            "ERROR " + drive.layout().keyValueStore() + " is damaged: it is no JSON object", emptyLine));
+    drive.log->clear();
+    store(R"({"PathwellTagDict": {}})");
+    EXPECT_THAT(drive.log->lines(),
+        ElementsAre("DEBUG Pathwell tag dictionary has incorrect version (0, should be 2)", emptyLine));
+}
+
+} // namespace
+} // namespace tarrow
