@@ -60,7 +60,6 @@ ServiceSet systemServices(const std::string& executable, const UserLocale& local
     set.dispatch = std::make_shared<host::system::GLibDispatch>();
     set.notificationCenter = std::make_shared<platform::NotificationCenter>();
     set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
-    set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>();
     const auto types = std::make_shared<host::system::MimeTypeRegistry>();
     set.typeRegistry = types;
     set.folderLister =
@@ -79,6 +78,8 @@ DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale)
         {set.dispatch, set.notificationCenter, set.typeRegistry, set.localization, set.linkOpener},
         {.languages = locale.languageList()});
     set.cloudDocumentService = cloud;
+    set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>(
+        host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination()});
     set.storageOfferManager = cloud->storageOffers();
     set.keyValueStore = cloud->keyValueStore();
     set.userDefaults =

@@ -1,25 +1,54 @@
 #pragma once
 
-#include "host/system/CoordinatedRead.h"
+#include "host/system/LockFile.h"
+#include "host/system/PresenterNotices.h"
 #include "platform/FileCoordinator.h"
+
+#include <span>
 
 namespace host::system {
 
-/// Coordination of reads on this machine. A read runs at once: what is being written lies under another name
-/// until it is whole, so a reader never sees half of it and has nothing to wait for.
+/// Coordination on this machine. A metadata read runs at once: what is being written lies under another name
+/// until it is whole, so a reader never sees half of it. Every other read and every write takes its place in
+/// a LockFile. Presenters are asked before the locks are taken, so that what they do to get ready does not
+/// wait for the writer that waits for them.
 class LocalFileCoordinator : public platform::FileCoordinator {
 public:
+    struct Settings {
+        std::string lockFile = {}; ///< shared by all processes that are to exclude each other; empty: this
+                                   ///< one alone
+        platform::Duration patience = std::chrono::seconds(3); ///< for presenters, in each write
+        std::function<void()> beforeWaiting =
+            nullptr; ///< runs on the writer's thread before it waits for presenters
+    };
+
+    LocalFileCoordinator();
+    explicit LocalFileCoordinator(Settings settings);
+
     std::optional<platform::Error> coordinateReading(
-        const platform::Url& url, platform::ReadingOptions options, const Accessor& accessor) override
-    {
-        if (options == platform::ReadingOptions::ImmediatelyAvailableMetadataOnly) {
-            const CoordinatedRead marked;
-            accessor(url);
-        } else {
-            accessor(url);
-        }
-        return std::nullopt;
-    }
+        const platform::Url& url, platform::ReadingOptions options, const Accessor& accessor) override;
+    std::optional<platform::Error> coordinateWriting(
+        const platform::Url& url, platform::WritingOptions options, const Accessor& accessor) override;
+    std::optional<platform::Error> coordinateWriting(const platform::Url& first,
+        platform::WritingOptions firstOptions, const platform::Url& second,
+        platform::WritingOptions secondOptions, const PairAccessor& accessor) override;
+    void itemWillMove(const platform::Url& from, const platform::Url& to) override;
+    void itemDidMove(const platform::Url& from, const platform::Url& to) override;
+    void addFilePresenter(const std::shared_ptr<platform::FilePresenter>& presenter) override;
+    void removeFilePresenter(const platform::FilePresenter& presenter) override;
+
+private:
+    struct Target {
+        platform::Url url;
+        platform::WritingOptions options;
+    };
+    std::optional<platform::Error> write(std::span<const Target> targets, const std::function<void()>& body);
+    std::optional<platform::Error> runLocked(
+        const std::vector<LockFile::Claim>& claims, const std::function<void()>& body);
+    void tellAfterwards(const Target& target);
+
+    LockFile _locks;
+    PresenterNotices _notices;
 };
 
 } // namespace host::system

@@ -65,7 +65,13 @@ DriveFixture::DriveFixture()
     platform::ServiceSet set;
     set.dispatch = dispatch;
     set.notificationCenter = notifications;
-    set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>();
+    // Presenters answer on queues that only this thread drives.
+    set.fileCoordinator =
+        std::make_shared<host::system::LocalFileCoordinator>(host::system::LocalFileCoordinator::Settings{
+            .lockFile = layout.coordination(), .beforeWaiting = [queues = std::weak_ptr(dispatch)] {
+                if (const auto all = queues.lock())
+                    all->runUntilIdle();
+            }});
     set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
     set.characterData = std::make_shared<host::system::UnicodeCharacterData>();
     set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");

@@ -26,6 +26,33 @@ public:
     }
     std::optional<platform::Error> coordinateReading(
         const platform::Url& url, platform::ReadingOptions options, const Accessor& accessor) override;
+    std::optional<platform::Error> coordinateWriting(
+        const platform::Url& url, platform::WritingOptions options, const Accessor& accessor) override
+    {
+        return _real.coordinateWriting(url, options, accessor);
+    }
+    std::optional<platform::Error> coordinateWriting(const platform::Url& first,
+        platform::WritingOptions firstOptions, const platform::Url& second,
+        platform::WritingOptions secondOptions, const PairAccessor& accessor) override
+    {
+        return _real.coordinateWriting(first, firstOptions, second, secondOptions, accessor);
+    }
+    void itemWillMove(const platform::Url& from, const platform::Url& to) override
+    {
+        _real.itemWillMove(from, to);
+    }
+    void itemDidMove(const platform::Url& from, const platform::Url& to) override
+    {
+        _real.itemDidMove(from, to);
+    }
+    void addFilePresenter(const std::shared_ptr<platform::FilePresenter>& presenter) override
+    {
+        _real.addFilePresenter(presenter);
+    }
+    void removeFilePresenter(const platform::FilePresenter& presenter) override
+    {
+        _real.removeFilePresenter(presenter);
+    }
     std::vector<std::string> takeReads();
 
 private:

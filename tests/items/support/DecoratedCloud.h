@@ -31,6 +31,27 @@ public:
         ++reads;
         return refusal ? refusal : _real->coordinateReading(elsewhere.value_or(url), options, accessor);
     }
+    std::optional<Error> coordinateWriting(
+        const Url& url, platform::WritingOptions options, const Accessor& accessor) override
+    {
+        return refusal ? refusal : _real->coordinateWriting(elsewhere.value_or(url), options, accessor);
+    }
+    std::optional<Error> coordinateWriting(const Url& first, platform::WritingOptions firstOptions,
+        const Url& second, platform::WritingOptions secondOptions, const PairAccessor& accessor) override
+    {
+        return refusal ? refusal
+                       : _real->coordinateWriting(first, firstOptions, second, secondOptions, accessor);
+    }
+    void itemWillMove(const Url& from, const Url& to) override { _real->itemWillMove(from, to); }
+    void itemDidMove(const Url& from, const Url& to) override { _real->itemDidMove(from, to); }
+    void addFilePresenter(const std::shared_ptr<platform::FilePresenter>& presenter) override
+    {
+        _real->addFilePresenter(presenter);
+    }
+    void removeFilePresenter(const platform::FilePresenter& presenter) override
+    {
+        _real->removeFilePresenter(presenter);
+    }
 
 private:
     std::shared_ptr<platform::FileCoordinator> _real;

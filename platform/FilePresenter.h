@@ -1,0 +1,52 @@
+#pragma once
+
+#include "platform/Error.h"
+#include "platform/Url.h"
+
+#include <functional>
+#include <memory>
+#include <optional>
+
+namespace platform {
+
+class OperationQueue;
+
+/// Something that shows an item, or keeps it open, and wants to hear what coordinated writes do to it. The
+/// first two calls come on the writer's thread, all others as operations of the presenter's queue, several at
+/// once if that queue runs several.
+class FilePresenter {
+public:
+    /// Called once, on any thread, with why the deletion must not go on, or nothing. A handler that is
+    /// dropped without a call counts as called with nothing.
+    using CompletionHandler = std::function<void(const std::optional<Error>&)>;
+
+    virtual ~FilePresenter() = default;
+
+    /// The item or folder that is presented; nothing for none at this time. Asked anew at every write.
+    virtual std::optional<Url> presentedItemURL() = 0;
+    /// Where the calls below are to run; null: nothing is told.
+    virtual std::shared_ptr<OperationQueue> presentedItemOperationQueue() = 0;
+
+    /// The item, or something in the presented folder, may have changed. Once after each write.
+    virtual void presentedItemDidChange() { }
+    /// The item is about to move. The writer waits, within limits, until this returns.
+    virtual void presentedItemWillMoveToURL(const Url& newURL) { static_cast<void>(newURL); }
+    /// The item, or a folder that it lies in, was moved and is at a new location now.
+    virtual void presentedItemDidMoveToURL(const Url& newURL) { static_cast<void>(newURL); }
+
+    /// The item, or a folder that it lies in, is about to be deleted. The writer waits, within limits, for
+    /// the completion.
+    virtual void accommodatePresentedItemDeletionWithCompletionHandler(CompletionHandler completion)
+    {
+        completion(std::nullopt);
+    }
+    /// The same for something in the presented folder, at any depth.
+    virtual void accommodatePresentedSubitemDeletionAtURLCompletionHandler(
+        const Url& url, CompletionHandler completion)
+    {
+        static_cast<void>(url);
+        completion(std::nullopt);
+    }
+};
+
+} // namespace platform
