@@ -15,11 +15,12 @@ namespace host::system {
 class LocalFileCoordinator : public platform::FileCoordinator {
 public:
     struct Settings {
-        std::string lockFile = {}; ///< shared by all processes that are to exclude each other; empty: this
-                                   ///< one alone
-        platform::Duration patience = std::chrono::seconds(3); ///< for presenters, in each write
-        std::function<void()> beforeWaiting =
-            nullptr; ///< runs on the writer's thread before it waits for presenters
+        /// Shared by all processes that are to exclude each other; empty: this one alone.
+        std::string lockFile = {};
+        /// How long each write waits for presenters.
+        platform::Duration patience = std::chrono::seconds(3);
+        /// Runs on the writer's thread before it waits for presenters.
+        std::function<void()> beforeWaiting = nullptr;
     };
 
     LocalFileCoordinator();
