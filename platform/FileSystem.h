@@ -40,6 +40,10 @@ public:
     virtual void enumerateDeeply(const Url& folder,
         const std::function<Continue(const Url&, FileType)>& entry,
         const std::function<Continue(const Url&, const Error&)>& error) const = 0;
+    /// The same for what lies directly in a folder, hidden files included.
+    virtual void enumerateShallowly(const Url& folder,
+        const std::function<Continue(const Url&, FileType)>& entry,
+        const std::function<Continue(const Url&, const Error&)>& error) const = 0;
 };
 
 } // namespace platform

@@ -93,4 +93,25 @@ void PosixFileSystem::enumerateDeeply(const platform::Url& folder,
     DeepEnumeration(folder, entry, error).run();
 }
 
+void PosixFileSystem::enumerateShallowly(const platform::Url& folder,
+    const std::function<Continue(const platform::Url&, FileType)>& entry,
+    const std::function<Continue(const platform::Url&, const platform::Error&)>& error) const
+{
+    const auto descriptor = openFolder(folder.path());
+    if (!descriptor) {
+        error(folder, systemError(errno, folder.path()));
+        return;
+    }
+    DirectoryReader reader(descriptor);
+    while (const auto found = reader.next()) {
+        const auto type = found->type ? found->type : typeOfEntry(descriptor, found->name);
+        const auto kind =
+            type == FileType::Directory ? platform::PathKind::Directory : platform::PathKind::Unknown;
+        if (type && entry(folder.appendingPathComponent(found->name, kind), *type) == Continue::No)
+            return;
+    }
+    if (reader.errorNumber())
+        error(folder, systemError(reader.errorNumber(), folder.path()));
+}
+
 } // namespace host::system

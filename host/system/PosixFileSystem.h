@@ -15,6 +15,9 @@ public:
     void enumerateDeeply(const platform::Url& folder,
         const std::function<Continue(const platform::Url&, platform::FileType)>& entry,
         const std::function<Continue(const platform::Url&, const platform::Error&)>& error) const override;
+    void enumerateShallowly(const platform::Url& folder,
+        const std::function<Continue(const platform::Url&, platform::FileType)>& entry,
+        const std::function<Continue(const platform::Url&, const platform::Error&)>& error) const override;
 };
 
 /// The extended attribute that hides a file's extension; its value is "1".

@@ -99,6 +99,34 @@ TEST_F(FileSystemTest, EnumeratesEverythingBelowWithoutFollowingLinks)
     EXPECT_TRUE(errors.empty());
 }
 
+TEST_F(FileSystemTest, AShallowEnumerationStaysInTheFolder)
+{
+    directory.write("top/.hidden", "");
+    directory.write("top/Folder/inside", "");
+    std::filesystem::create_directory_symlink("Folder", directory.at("top/link"));
+    std::vector<std::string> found;
+    const auto record = [&](const Url& url, FileType type) {
+        found.push_back(url.lastPathComponent() + ':' + "rdlo"[static_cast<int>(type)]);
+        return Continue::Yes;
+    };
+    const auto fail = [&](const Url&, const Error& error) {
+        errors.push_back(error);
+        return Continue::Yes;
+    };
+    files.enumerateShallowly(Url::fileURL(directory.at("top")), record, fail);
+    std::ranges::sort(found);
+    EXPECT_EQ(found, (std::vector<std::string>{".hidden:r", "Folder:d", "link:l"}));
+    EXPECT_TRUE(errors.empty());
+
+    int entries = 0;
+    files.enumerateShallowly(
+        Url::fileURL(directory.at("top")), [&](auto&&...) { return ++entries, Continue::No; }, fail);
+    EXPECT_EQ(entries, 1);
+    files.enumerateShallowly(Url::fileURL(directory.at("gone")), record, fail);
+    ASSERT_EQ(errors.size(), 1U);
+    EXPECT_TRUE(errors[0].is(FileErrorCode::NoSuchItem));
+}
+
 TEST_F(FileSystemTest, EnumerationStopsWhenAskedAndReportsFoldersThatCannotBeRead)
 {
     directory.write("top/a/1", "");

@@ -4,6 +4,7 @@
 #include "host/system/LocalFileCoordinator.h"
 #include "host/system/MimeTypeRegistry.h"
 #include "host/system/PosixFileSystem.h"
+#include "host/system/ThreadedFolderLister.h"
 #include "host/system/TypePreviewSupport.h"
 #include "host/system/UnicodeCharacterData.h"
 #include "platform/Services.h"
@@ -27,7 +28,9 @@ ItemsFixture::ItemsFixture()
     set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
     set.localization = texts;
     set.notificationCenter = notifications;
-    set.typeRegistry = std::make_shared<host::system::MimeTypeRegistry>();
+    const auto types = std::make_shared<host::system::MimeTypeRegistry>();
+    set.typeRegistry = types;
+    set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(dispatch, types, "en_US");
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(set.typeRegistry);
     platform::installServices(std::move(set));
 }

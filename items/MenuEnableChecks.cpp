@@ -1,0 +1,167 @@
+#include "items/MenuEnableChecks.h"
+
+#include "items/DRItem.h"
+#include "items/FileUtils.h"
+#include "items/UrlResolution.h"
+#include "platform/FileSystem.h"
+#include "platform/components/DocumentListController.h"
+
+#include <algorithm>
+#include <array>
+
+namespace tarrow {
+
+namespace {
+
+namespace folderLevels = platform::folderLevels;
+using Container = std::shared_ptr<const DocumentContainer>;
+using platform::FileSystem;
+using platform::FileType;
+
+/// The container of the folder that a list shows, and how many folders below its documents folder that lies;
+/// no container, and a line in the log, when it cannot be found.
+struct Place {
+    Container container;
+    std::size_t depth = 0;
+};
+Place placeOf(const MenuEnableChecks::List& list, const Operation& op)
+{
+    const auto& url = list.presentedURL();
+    Container container;
+    std::optional<std::vector<std::string>> names;
+    const auto error = url
+        ? FileUtils::containerAndRelativePathforURLContainerRelativePathComponents(*url, &container, &names)
+        : std::nullopt;
+    if (!error && container)
+        return {container, names ? names->size() : 0};
+    op.error("Couldn't get container for URL %@: %@", url, error);
+    return {};
+}
+
+bool isFolder(const Url& url)
+{
+    constexpr std::array keys{AttributeKey::IsDirectory, AttributeKey::IsPackage};
+    const auto values =
+        services().cloudDocumentService().promisedItems().promisedItemResourceValues(url, keys).value;
+    return values && values->flag(AttributeKey::IsDirectory) && !values->flag(AttributeKey::IsPackage);
+}
+
+/// The item that an entry of a folder stands for, when that may be a folder that is shown.
+std::optional<Url> possibleFolder(const Url& entry, FileType type)
+{
+    if (!entry.lastPathComponent().starts_with('.'))
+        return type == FileType::Directory ? std::optional(entry) : std::nullopt;
+    auto promised = trw_URLByResolvingPromise(entry);
+    return promised.isSameObject(entry) ? std::nullopt : std::optional(std::move(promised));
+}
+
+bool hasFolder(const Url& documents)
+{
+    static constexpr Operation op{"+[MenuEnableChecks containerHasSubfolders:]"};
+    bool found = false;
+    services().fileSystem().enumerateShallowly(
+        documents,
+        [&](const Url& entry, FileType type) {
+            const auto candidate = possibleFolder(entry, type);
+            found = candidate && isFolder(*candidate);
+            return found ? FileSystem::Continue::No : FileSystem::Continue::Yes;
+        },
+        [&](const Url& location, const Error& error) {
+            op.info("Error enumerating %@: %@", location, error);
+            return FileSystem::Continue::Yes;
+        });
+    return found;
+}
+
+} // namespace
+
+std::size_t MenuEnableChecks::numContainersInURLArray(const std::vector<Url>& urls)
+{
+    const auto& containers = services().cloudDocumentService().containers();
+    return static_cast<std::size_t>(
+        std::ranges::count_if(urls, [&](const Url& url) { return containers.isContainerTopFolder(url); }));
+}
+
+std::size_t MenuEnableChecks::numFoldersInURLArray(const std::vector<Url>& urls)
+{
+    return std::ranges::any_of(urls,
+               [](const Url& url) {
+                   const auto item = DRItem::initWithURL(url);
+                   return item && item->isDirectory();
+               })
+        ? 1
+        : 0;
+}
+
+bool MenuEnableChecks::isDesktopOrDocumentsInURLArray(const std::vector<Url>& urls)
+{
+    return std::ranges::any_of(urls, trw_isDesktopOrDocumentsFolder);
+}
+
+bool MenuEnableChecks::canShowMoveForSelectedItems(const List& list)
+{
+    const auto selection = list.selectedItems();
+    if (selection.empty() || isDesktopOrDocumentsInURLArray(selection)
+        || numContainersInURLArray(selection) > 0)
+        return false;
+    return containerSupportsAnyDepth(list) || numFoldersInURLArray(selection) == 0;
+}
+
+bool MenuEnableChecks::canShowDeleteForSelectedItems(const List& list)
+{
+    const auto selection = list.selectedItems();
+    if (selection.empty() || isDesktopOrDocumentsInURLArray(selection))
+        return false;
+    const auto containers = numContainersInURLArray(selection);
+    return containers == 0 || containers == selection.size();
+}
+
+bool MenuEnableChecks::canEnableNewFolderForSelectedItems(const List& list)
+{
+    static constexpr Operation op{"+[MenuEnableChecks canEnableNewFolderForSelectedItems:]"};
+    const auto [container, depth] = placeOf(list, op);
+    if (!container)
+        return false;
+    const auto& [identifier, levels] = std::tie(container->identifier, container->supportedFolderLevels);
+    if (!levels)
+        op.debug("Container %@ has no depth. Enabling new folder button", identifier);
+    else if (*levels == folderLevels::none)
+        op.debug("Container %@ supports no folders. Disabling new folder button", identifier);
+    else if (*levels == folderLevels::any)
+        op.debug("Container %@ supports any folder. Enabling new folder button", identifier);
+    else if (*levels == folderLevels::one && depth == 0)
+        op.debug("Container %@ supports one folder. File is depth 0. Enabling new folder button", identifier);
+    else if (*levels == folderLevels::one)
+        op.debug("Container %@ supports one folder. File is depth %u. Disabling new folder button",
+            identifier, depth);
+    else
+        op.warning(
+            "Container %@ has unknown depth option %@. Disabling new folder button", identifier, *levels);
+    return !levels || *levels == folderLevels::any || (*levels == folderLevels::one && depth == 0);
+}
+
+bool MenuEnableChecks::containerSupportsAnyDepth(const List& list)
+{
+    static constexpr Operation op{"+[MenuEnableChecks containerSupportsAnyDepth:]"};
+    const auto container = placeOf(list, op).container;
+    if (!container)
+        return false;
+    const auto& levels = container->supportedFolderLevels;
+    if (!levels)
+        op.debug("Container %@ has no depth. Enabling new folder button", container->identifier);
+    else if (*levels == folderLevels::any)
+        op.debug("Container %@ supports any folder. Enabling new folder button", container->identifier);
+    return !levels || *levels == folderLevels::any;
+}
+
+bool MenuEnableChecks::containerHasSubfolders(const Url& url)
+{
+    Container container;
+    const auto error =
+        FileUtils::containerAndRelativePathforURLContainerRelativePathComponents(url, &container, nullptr);
+    if (error || !container)
+        return true;
+    return container->documentsURL && hasFolder(*container->documentsURL);
+}
+
+} // namespace tarrow
