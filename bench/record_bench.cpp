@@ -46,8 +46,9 @@ public:
         set.formatters = std::make_shared<host::system::IcuFormatters>("en_US");
         set.typeRegistry = std::make_shared<host::system::MimeTypeRegistry>();
         set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(set.typeRegistry);
-        set.cloudDocumentService = host::drive::LocalCloudDocumentService::create(
-            layout, {set.dispatch, set.notificationCenter, set.typeRegistry, nullptr, nullptr});
+        set.cloudDocumentService = host::drive::LocalCloudDocumentService::create(layout,
+            {set.dispatch, set.notificationCenter, set.typeRegistry, nullptr, nullptr},
+            {.languages = {"en"}});
         platform::installServices(std::move(set));
         for (int i = 0; i < itemCount; ++i)
             addItems(std::to_string(i));

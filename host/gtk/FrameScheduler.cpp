@@ -23,8 +23,15 @@ void FrameScheduler::schedule(const void* owner, Work work)
     requestFrame();
 }
 
+void FrameScheduler::scheduleNextFrame(const void* owner, Work work)
+{
+    _later.insert_or_assign(owner, std::move(work));
+    requestFrame();
+}
+
 void FrameScheduler::cancel(const void* owner)
 {
+    _later.erase(owner);
     if (_pending.erase(owner))
         std::erase(_order, owner);
 }
@@ -32,6 +39,8 @@ void FrameScheduler::cancel(const void* owner)
 void FrameScheduler::flush()
 {
     const auto self = shared_from_this();
+    for (auto& [owner, work] : std::exchange(_later, {}))
+        schedule(owner, work);
     for (int round = 0; round < maximumRounds && !_pending.empty(); ++round) {
         const auto owners = std::exchange(_order, {});
         for (const void* owner : owners) {
@@ -41,7 +50,7 @@ void FrameScheduler::flush()
                 found.mapped()();
         }
     }
-    if (!_pending.empty())
+    if (!isIdle())
         requestFrame();
 }
 
@@ -61,7 +70,7 @@ void FrameScheduler::windowWasRealized()
 {
     _clock = ObjectRef<GdkFrameClock>::retain(gtk_widget_get_frame_clock(_window));
     _onUpdate = connectSignal<void()>(_clock.get(), "update", [this] { flush(); });
-    if (!_pending.empty())
+    if (!isIdle())
         requestFrame();
 }
 

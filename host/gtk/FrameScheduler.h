@@ -24,9 +24,11 @@ public:
     /// that ends before takes its work back with `cancel`.
     void schedule(const void* owner, Work work);
     void cancel(const void* owner);
+    /// Runs `work` in a frame of its own: when it is called inside of a frame, in the one after.
+    void scheduleNextFrame(const void* owner, Work work);
     /// Runs what waits now. What is scheduled meanwhile runs as well, up to a limit that ends endless chains.
     void flush();
-    bool isIdle() const { return _pending.empty(); }
+    bool isIdle() const { return _pending.empty() && _later.empty(); }
 
     /// The window's frames drive the work from now on.
     void attach(GtkWidget* window);
@@ -38,7 +40,7 @@ private:
     void requestFrame();
     void windowWasRealized();
 
-    std::map<const void*, Work> _pending;
+    std::map<const void*, Work> _pending, _later;
     std::vector<const void*> _order;
     ObjectRef<GdkFrameClock> _clock;
     SignalConnection _onUpdate, _onRealize, _onUnrealize;

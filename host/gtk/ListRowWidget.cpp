@@ -13,10 +13,14 @@ namespace ui = platform::ui;
 constexpr int iconSize = 32, smallIconSize = 16;
 constexpr int dotDiameter = 10, dotStep = 7; ///< dots of several tags overlap
 
+/// What a row may hold, from its leading edge to its trailing one.
+enum Part { Check, Icon, Texts, Dots, Download, Progress, Chevron, partCount };
+
 struct TrwListRow {
     GtkWidget parent;
     GtkListItem* item; ///< owns this widget
-    GtkWidget *check, *icon, *title, *detail, *dots, *download, *progress, *chevron;
+    GtkWidget* parts[partCount]; ///< made when a row first needs them: 205 rows live beside the visible ones
+    GtkWidget *title, *detail;
     ui::ListRow* shown;
     bool isFilled;
 };
@@ -101,20 +105,13 @@ GtkWidget* label(const char* styleClass, PangoEllipsizeMode ellipsize)
     return made;
 }
 
-GtkWidget* append(TrwListRow* row, GtkWidget* child)
-{
-    gtk_widget_set_valign(child, GTK_ALIGN_CENTER);
-    gtk_widget_set_parent(child, GTK_WIDGET(row));
-    return child;
-}
-
 GtkWidget* drawing(TrwListRow* row, GtkDrawingAreaDrawFunc draw, int width, int height)
 {
     auto* area = gtk_drawing_area_new();
     gtk_drawing_area_set_content_width(GTK_DRAWING_AREA(area), width);
     gtk_drawing_area_set_content_height(GTK_DRAWING_AREA(area), height);
     gtk_drawing_area_set_draw_func(GTK_DRAWING_AREA(area), draw, row, nullptr);
-    return append(row, area);
+    return area;
 }
 
 GtkWidget* texts(TrwListRow* row)
@@ -128,22 +125,62 @@ GtkWidget* texts(TrwListRow* row)
     return box;
 }
 
-void trw_list_row_init(TrwListRow* row)
+GtkWidget* checkMark()
 {
-    row->shown = new ui::ListRow();
     auto* check = gtk_check_button_new();
     gtk_widget_add_css_class(check, "selection-mode");
     gtk_widget_set_can_target(check, FALSE);
     gtk_widget_set_focusable(check, FALSE);
-    row->check = append(row, check);
-    row->icon = append(row, gtk_image_new());
-    append(row, texts(row));
-    row->dots = drawing(row, drawDots, dotDiameter, dotDiameter);
-    row->download = append(row, gtk_image_new_from_icon_name("trw-in-cloud-symbolic"));
-    row->progress = drawing(row, drawProgress, smallIconSize, smallIconSize);
-    row->chevron = append(row, gtk_image_new_from_icon_name("go-next-symbolic"));
-    for (auto* dimmed : {row->download, row->progress, row->chevron})
-        gtk_widget_add_css_class(dimmed, "dim-label");
+    return check;
+}
+
+GtkWidget* makePart(TrwListRow* row, Part part)
+{
+    switch (part) {
+    case Check:
+        return checkMark();
+    case Icon:
+        return gtk_image_new();
+    case Texts:
+        return texts(row);
+    case Dots:
+        return drawing(row, drawDots, dotDiameter, dotDiameter);
+    case Download:
+        return gtk_image_new_from_icon_name("trw-in-cloud-symbolic");
+    case Progress:
+        return drawing(row, drawProgress, smallIconSize, smallIconSize);
+    default:
+        return gtk_image_new_from_icon_name("go-next-symbolic");
+    }
+}
+
+/// Puts a new part behind those that come before it.
+void insert(TrwListRow* row, Part part, GtkWidget* made)
+{
+    GtkWidget* before = nullptr;
+    for (int i = 0; i < part; ++i)
+        before = row->parts[i] ? row->parts[i] : before;
+    gtk_widget_set_valign(made, GTK_ALIGN_CENTER);
+    if (part == Download || part == Progress || part == Chevron)
+        gtk_widget_add_css_class(made, "dim-label");
+    gtk_widget_insert_after(made, GTK_WIDGET(row), before);
+    row->parts[part] = made;
+}
+
+/// Shows or hides a part; null when it is not wanted and was never made.
+GtkWidget* showPart(TrwListRow* row, Part part, bool wanted)
+{
+    if (wanted && !row->parts[part])
+        insert(row, part, makePart(row, part));
+    else if (row->parts[part])
+        gtk_widget_set_visible(row->parts[part], wanted);
+    return row->parts[part];
+}
+
+void trw_list_row_init(TrwListRow* row)
+{
+    row->shown = new ui::ListRow();
+    showPart(row, Texts, true);
 }
 
 void showTexts(TrwListRow* row, const ui::ListRow& content)
@@ -155,25 +192,26 @@ void showTexts(TrwListRow* row, const ui::ListRow& content)
 
 void showMarks(TrwListRow* row, const ui::ListRow& content)
 {
-    gtk_widget_set_visible(row->check, content.check != ui::CheckState::None);
-    gtk_check_button_set_active(GTK_CHECK_BUTTON(row->check), content.check == ui::CheckState::On);
-    gtk_widget_set_visible(row->download, content.download == ui::DownloadState::InCloud);
-    gtk_widget_set_visible(row->progress, content.download == ui::DownloadState::Downloading);
-    gtk_widget_queue_draw(row->progress);
-    gtk_widget_set_visible(row->chevron,
-        content.accessory == ui::RowAccessory::Disclosure && content.check == ui::CheckState::None);
-    const int dots = static_cast<int>(content.tagColors.size());
-    gtk_widget_set_visible(row->dots, dots > 0);
-    gtk_drawing_area_set_content_width(
-        GTK_DRAWING_AREA(row->dots), dotDiameter + std::max(0, dots - 1) * dotStep);
-    gtk_widget_queue_draw(row->dots);
+    const bool isEditing = content.check != ui::CheckState::None;
+    if (auto* check = showPart(row, Check, isEditing))
+        gtk_check_button_set_active(GTK_CHECK_BUTTON(check), content.check == ui::CheckState::On);
+    showPart(row, Download, content.download == ui::DownloadState::InCloud);
+    if (auto* progress = showPart(row, Progress, content.download == ui::DownloadState::Downloading))
+        gtk_widget_queue_draw(progress);
+    showPart(row, Chevron, content.accessory == ui::RowAccessory::Disclosure && !isEditing);
+    const int count = static_cast<int>(content.tagColors.size());
+    if (auto* dots = showPart(row, Dots, count > 0)) {
+        gtk_drawing_area_set_content_width(
+            GTK_DRAWING_AREA(dots), dotDiameter + std::max(0, count - 1) * dotStep);
+        gtk_widget_queue_draw(dots);
+    }
 }
 
 void showIcon(TrwListRow* row, const ui::ListRow& content)
 {
-    gtk_widget_set_visible(row->icon, content.image.has_value());
+    auto* icon = showPart(row, Icon, content.image.has_value());
     if (content.image)
-        host::gtk::ImagePaint::show(GTK_IMAGE(row->icon), *content.image, iconSize);
+        host::gtk::ImagePaint::show(GTK_IMAGE(icon), *content.image, iconSize);
 }
 
 void showStyle(TrwListRow* row, const ui::ListRow& content)

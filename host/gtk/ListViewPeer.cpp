@@ -14,6 +14,11 @@ using platform::Point;
 
 namespace {
 
+/// The toolkit keeps about this many rows as widgets, whatever the screen shows; more rows cost nothing.
+constexpr std::size_t livingRows = 220;
+/// How many of them are made in one frame, so that a frame stays a frame: the first fill a tall screen.
+constexpr std::size_t firstRows = 24, moreRows = 12;
+
 template <typename Observer, typename Peer>
 std::shared_ptr<Observer> observing(Peer& peer)
 {
@@ -25,6 +30,14 @@ bool isShiftHeld(GtkWidget* widget)
     auto* seat = gdk_display_get_default_seat(gtk_widget_get_display(widget));
     auto* keyboard = seat ? gdk_seat_get_keyboard(seat) : nullptr;
     return keyboard && (gdk_device_get_modifier_state(keyboard) & GDK_SHIFT_MASK) != 0;
+}
+
+std::size_t rowCountBefore(const ui::ListView& list, const ui::ListChanges& changes)
+{
+    std::size_t count = list.rowCount();
+    for (const auto& splice : changes.splices)
+        count = count + splice.removed - splice.inserted;
+    return count;
 }
 
 } // namespace
@@ -41,6 +54,7 @@ ListViewPeer::ListViewPeer(std::shared_ptr<PeerContext> context, const std::shar
 ListViewPeer::~ListViewPeer()
 {
     context().scheduler().cancel(&_refreshKey);
+    context().scheduler().cancel(&_growKey);
     _onScroll.disconnect();
     // The list ends now, while its rows' handlers are still connected to this.
     gtk_list_view_set_model(GTK_LIST_VIEW(_listWidget), nullptr);
@@ -206,25 +220,54 @@ void ListViewPeer::mirror(ui::View& shown, ui::ViewChanges changes)
         return;
     list->setScrollObserver(observing<ui::ScrollObserver>(*this));
     list->setListObserver(observing<ui::ListViewObserver>(*this));
-    if (g_list_model_get_n_items(_rows.get()) != list->rowCount())
-        RowModel::reset(_rows.get(), static_cast<guint>(list->rowCount()));
+    showRows(list->rowCount());
     refreshRows();
     refreshStateDidChange(*list);
 }
 
+void ListViewPeer::showRows(std::size_t count)
+{
+    const std::size_t known = g_list_model_get_n_items(_rows.get());
+    if (known == count)
+        return;
+    // A list that is far enough is complete at once; one that begins grows into its rows.
+    const auto next =
+        known >= livingRows || count <= firstRows ? count : std::min(count, std::max(known, firstRows));
+    const auto kept = std::min(known, next);
+    RowModel::splice(_rows.get(), static_cast<guint>(kept), static_cast<guint>(known - kept),
+        static_cast<guint>(next - kept));
+    if (next < count)
+        context().scheduler().scheduleNextFrame(&_growKey, [this] { growRows(); });
+}
+
+void ListViewPeer::growRows()
+{
+    const auto list = _list.lock();
+    const std::size_t known = g_list_model_get_n_items(_rows.get());
+    if (!list || known >= list->rowCount())
+        return;
+    const auto next = known >= livingRows ? list->rowCount() : std::min(list->rowCount(), known + moreRows);
+    RowModel::splice(_rows.get(), static_cast<guint>(known), 0, static_cast<guint>(next - known));
+    if (next < list->rowCount())
+        context().scheduler().scheduleNextFrame(&_growKey, [this] { growRows(); });
+}
+
 void ListViewPeer::rowsWereReset(ui::ListView& list)
 {
-    RowModel::reset(_rows.get(), static_cast<guint>(list.rowCount()));
+    RowModel::reset(_rows.get(), 0);
+    showRows(list.rowCount());
     refreshRowsLater();
 }
 
 void ListViewPeer::rowsDidChange(ui::ListView& list, const ui::ListChanges& changes)
 {
-    for (const auto& splice : changes.splices)
-        RowModel::splice(_rows.get(), static_cast<guint>(splice.position), static_cast<guint>(splice.removed),
-            static_cast<guint>(splice.inserted));
-    if (g_list_model_get_n_items(_rows.get()) != list.rowCount())
-        RowModel::reset(_rows.get(), static_cast<guint>(list.rowCount()));
+    // A list that still grows shows its beginning only: its rows are read anew instead.
+    if (g_list_model_get_n_items(_rows.get()) == rowCountBefore(list, changes)) {
+        for (const auto& splice : changes.splices)
+            RowModel::splice(_rows.get(), static_cast<guint>(splice.position),
+                static_cast<guint>(splice.removed), static_cast<guint>(splice.inserted));
+    }
+    showRows(list.rowCount());
     refreshRowsLater();
 }
 
@@ -253,6 +296,8 @@ void ListViewPeer::refreshRows()
 
 void ListViewPeer::scrollTo(ui::ScrollView& view, Point offset, bool /*animated*/)
 {
+    if (const auto list = _list.lock(); list && offset.y > 0)
+        RowModel::complete(_rows.get(), static_cast<guint>(list->rowCount()));
     const SignalBlock block(_onScroll);
     auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
     gtk_adjustment_set_value(adjustment, offset.y + view.contentInsets().top);
@@ -263,6 +308,7 @@ void ListViewPeer::scrollExtentDidChange(ui::ScrollView&) { }
 void ListViewPeer::scrollToRow(
     ui::ListView& list, std::size_t index, ui::RowPosition position, bool /*animated*/)
 {
+    RowModel::complete(_rows.get(), static_cast<guint>(list.rowCount()));
     auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
     const double page = gtk_adjustment_get_page_size(adjustment), height = list.rowHeight();
     const double top = static_cast<double>(index) * height, now = gtk_adjustment_get_value(adjustment);

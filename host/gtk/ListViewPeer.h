@@ -43,6 +43,9 @@ private:
     void bindRow(GtkListItem* item);
     void activated(guint position);
     void scrolled();
+    /// Lets the widgets know of as many rows as a frame can make widgets for, and of more in the next frames.
+    void showRows(std::size_t count);
+    void growRows();
     void refreshRowsLater();
     void refreshRows();
     bool keyPressed(guint key, GdkModifierType modifiers);
@@ -53,6 +56,7 @@ private:
     GtkWidget *_listWidget = nullptr, *_window = nullptr, *_refresher = nullptr, *_spinner = nullptr;
     std::unordered_set<GtkListItem*> _live;
     SignalConnection _onScroll;
+    int _growKey = 0; ///< its address names the growing of the list in the scheduler
     int _refreshKey = 0; ///< its address names the refreshing of rows in the scheduler
 };
 

@@ -62,6 +62,13 @@ void splice(GListModel* model, guint position, guint removed, guint inserted)
     g_list_model_items_changed(model, position, removed, inserted);
 }
 
+void complete(GListModel* model, guint count)
+{
+    const guint known = rowsOf(model)->count;
+    if (known < count)
+        splice(model, known, 0, count - known);
+}
+
 void reset(GListModel* model, guint count)
 {
     splice(model, 0, rowsOf(model)->count, count);

@@ -12,6 +12,8 @@ namespace RowModel {
 ObjectRef<GListModel> make();
 /// Tells the widgets which rows went and came. `position` and `removed` are of the rows as they were.
 void splice(GListModel* model, guint position, guint removed, guint inserted);
+/// Adds the rows that the widgets do not know of yet, at the end.
+void complete(GListModel* model, guint count);
 /// Other rows, whatever they were before.
 void reset(GListModel* model, guint count);
 
