@@ -1,9 +1,11 @@
 #include "app/AppDelegate.h"
 #include "host/drive/LocalCloudDocumentService.h"
+#include "host/gtk/LaunchContext.h"
 #include "host/gtk/MakeApplication.h"
 #include "host/system/GLibDispatch.h"
 #include "host/system/GdkPixbufImageLoader.h"
 #include "host/system/GettextLocalization.h"
+#include "host/system/GioAppRegistry.h"
 #include "host/system/GioLinkOpener.h"
 #include "host/system/IcuFormatters.h"
 #include "host/system/JournalLogSink.h"
@@ -62,6 +64,8 @@ ServiceSet systemServices(const std::string& executable, const UserLocale& local
     set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
     const auto types = std::make_shared<host::system::MimeTypeRegistry>();
     set.typeRegistry = types;
+    set.appRegistry = std::make_shared<host::system::GioAppRegistry>(
+        types, "app.tarrow.Drive", host::gtk::makeLaunchContext);
     set.folderLister =
         std::make_shared<host::system::ThreadedFolderLister>(set.dispatch, types, locale.formats);
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(types);

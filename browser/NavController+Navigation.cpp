@@ -3,6 +3,7 @@
 #include "browser/NavController.h"
 #include "browser/PeekFolderViewController.h"
 #include "items/DRItem.h"
+#include "items/LaunchUtils.h"
 #include "items/UrlResolution.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
@@ -216,7 +217,7 @@ void NavController::documentListControllerDidSelectItemAtURL(const List&, const 
         op.debug("Building DLC stack for symlink to %@", item->url());
         openFolder(item->url(), op);
     } else {
-        openDocument(item);
+        openDocument(item, op);
     }
 }
 
@@ -239,8 +240,13 @@ void NavController::openFolder(const Url& url, const Operation& op)
         op.error("Couldn't build DLC stack for %@. Not switching to folder", url);
 }
 
-void NavController::openDocument(const std::shared_ptr<DRItem>& item)
+void NavController::openDocument(const std::shared_ptr<DRItem>& item, const Operation& op)
 {
+    if (LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(item->url(), topViewController(), true)) {
+        op.debug("openInDefaultApp returned YES, app launched");
+        return;
+    }
+    op.debug("openInDefaultApp returned NO, showing preview");
     // Later, so that the list ends its handling of the tap first.
     services().dispatch().mainQueue()->async([weak = std::weak_ptr(self()), item] {
         if (const auto browser = weak.lock())
@@ -320,6 +326,11 @@ void NavController::knopPopToURL(const Url& url)
         openFolder(item->url(), op);
         return;
     }
+    if (LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(item->url(), topViewController(), true)) {
+        op.debug("openInDefaultApp returned YES, app launched");
+        return;
+    }
+    op.debug("openInDefaultApp returned NO, showing cached Lookwell from Knop");
     const auto preview = _itemManager ? _itemManager->currentLookwellController() : nullptr;
     if (searching)
         warpToFolderForURL(url);

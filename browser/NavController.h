@@ -141,7 +141,7 @@ private:
     bool isSearchPresented() const;
     void showVanishedItem(const platform::Url& url);
     void openFolder(const platform::Url& url, const platform::Operation& op);
-    void openDocument(const std::shared_ptr<DRItem>& item);
+    void openDocument(const std::shared_ptr<DRItem>& item, const platform::Operation& op);
 
     bool _pickerIsAlive = false;
     std::weak_ptr<platform::ui::ViewController> _splitViewController;

@@ -1,5 +1,6 @@
 #include "platform/Services.h"
 
+#include "platform/AppRegistry.h"
 #include "platform/Application.h"
 #include "platform/CharacterData.h"
 #include "platform/CloudDocumentService.h"

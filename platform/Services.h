@@ -4,6 +4,7 @@
 
 namespace platform {
 
+class AppRegistry;
 class CharacterData;
 class CloudDocumentService;
 class Dispatch;
@@ -24,6 +25,7 @@ class UserDefaults;
 
 /// The installed platform services. A service that is not installed is null; main installs all of them.
 struct ServiceSet {
+    std::shared_ptr<AppRegistry> appRegistry;
     std::shared_ptr<CharacterData> characterData;
     std::shared_ptr<CloudDocumentService> cloudDocumentService;
     std::shared_ptr<Dispatch> dispatch;
@@ -51,6 +53,7 @@ public:
     {
     }
 
+    AppRegistry& appRegistry() const { return *_set.appRegistry; }
     CharacterData& characterData() const { return *_set.characterData; }
     CloudDocumentService& cloudDocumentService() const { return *_set.cloudDocumentService; }
     Dispatch& dispatch() const { return *_set.dispatch; }

@@ -164,4 +164,10 @@ void DocumentListController::peekWasOpened(ui::ListView&, std::size_t index)
         perform(DocumentListAction::PressurePop, rows->url(index));
 }
 
+void DocumentListController::openOutOfDriveViewControllerAction(
+    const Url&, const std::shared_ptr<ui::ViewController>&, const std::function<void()>& action)
+{
+    action();
+}
+
 } // namespace platform::components

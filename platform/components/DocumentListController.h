@@ -8,6 +8,7 @@
 #include "platform/ui/ListViewDelegate.h"
 #include "platform/ui/ViewController.h"
 
+#include <functional>
 #include <map>
 #include <memory>
 #include <optional>
@@ -70,6 +71,11 @@ public:
     void startSearchWithQueryStringBecomeFirstResponder(const std::string& query, bool becomeFirstResponder);
     /// Whether the list offers a search field of its own.
     virtual bool shouldShowSearch() const { return true; }
+
+    /// Runs an action that opens a document outside the program once what must be asked first was answered;
+    /// nothing needs to be asked here, so the action runs at once.
+    static void openOutOfDriveViewControllerAction(const Url& document,
+        const std::shared_ptr<ui::ViewController>& viewController, const std::function<void()>& action);
 
     /// Lists the folder anew.
     void refresh();

@@ -300,5 +300,46 @@ TEST_F(NavigationTest, APopOpensWhatWasPeekedAt)
         << "what was searched for is shown in its real place";
 }
 
+TEST_F(NavigationTest, ADocumentOpensInTheAppThatOwnsItAndElseInThePreview)
+{
+    const auto note = write("note.txt");
+    write("photo.png");
+    drive.writeLink("link", "note.txt");
+    launch();
+    apps->available = {{"Owner", {SimulatedApps::make("editor")}}};
+    const auto opened = SimulatedApps::Opened{note, "editor"};
+    tap(note);
+    EXPECT_THAT(apps->opened, ElementsAre(opened));
+    tap(url("link"));
+    EXPECT_THAT(apps->opened, ElementsAre(opened, opened)) << "a link opens what it leads to";
+    EXPECT_THAT(stack(), ElementsAre(top));
+
+    const auto peekAndPop = [this](const Url& item) {
+        browser->documentListControllerViewControllerForPreviewingItemAtURL(topList(), item);
+        browser->knopPopToURL(item);
+        settle();
+    };
+    openSearch();
+    peekAndPop(note);
+    EXPECT_EQ(search(), nullptr);
+    EXPECT_THAT(apps->opened, ElementsAre(opened, opened, opened));
+    EXPECT_THAT(stack(), ElementsAre(top));
+
+    apps->appsStart = false;
+    peekAndPop(note);
+    EXPECT_THAT(stack(), ElementsAre(top, "*"));
+    browser->popToRootViewController(false);
+    tap(note);
+    EXPECT_THAT(stack(), ElementsAre(top, "*"));
+    EXPECT_EQ(log->count("DEBUG openInDefaultApp returned YES, app launched"), 3);
+    EXPECT_EQ(log->count("DEBUG openInDefaultApp returned NO, showing preview"), 1);
+    EXPECT_EQ(log->count("DEBUG openInDefaultApp returned NO, showing cached Lookwell from Knop"), 1);
+
+    apps->appsStart = true;
+    browser->popToRootViewController(false);
+    tap(url("photo.png"));
+    EXPECT_THAT(stack(), ElementsAre(top, "*")) << "pictures are shown here";
+}
+
 } // namespace
 } // namespace tarrow

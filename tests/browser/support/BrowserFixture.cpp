@@ -39,12 +39,14 @@ BrowserFixture::BrowserFixture()
     cloud = std::make_shared<SimulatedCloud>(drive.cloud);
     const auto types = std::make_shared<host::system::MimeTypeRegistry>();
     platform::ServiceSet set;
+    set.appRegistry = apps;
     set.cloudDocumentService = cloud;
     set.dispatch = drive.dispatch;
     set.fileCoordinator = borrowed(_driveServices.fileCoordinator());
     set.fileSystem = borrowed(_driveServices.fileSystem());
     set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(drive.dispatch, types, "en_US");
     set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
+    set.imageLoader = borrowed(_driveServices.imageLoader());
     set.keyValueStore = borrowed(_driveServices.keyValueStore());
     set.keyedArchiver = borrowed(_driveServices.keyedArchiver());
     set.localization = englishTexts();

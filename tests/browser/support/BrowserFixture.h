@@ -5,6 +5,7 @@
 #include "platform/StateCoder.h"
 #include "platform/UserDefaults.h"
 #include "tests/support/DriveFixture.h"
+#include "tests/support/SimulatedApps.h"
 #include "tests/support/SimulatedCloud.h"
 #include "tests/support/SimulatedOffers.h"
 
@@ -25,8 +26,8 @@ class Window;
 
 namespace testing_support {
 
-/// A browser in a window, on the real store in a temporary folder. Only the account's token, the quota and
-/// the storage offers are simulated, and the clock.
+/// A browser in a window, on the real store in a temporary folder. Only the account's token, the quota,
+/// the storage offers and other apps are simulated, and the clock.
 class BrowserFixture : public testing::Test {
 protected:
     using List = std::shared_ptr<platform::components::DocumentListController>;
@@ -59,6 +60,7 @@ protected:
     const std::shared_ptr<RecordingLog>& log = drive.log;
     const std::shared_ptr<VirtualDispatch>& dispatch = drive.dispatch;
     std::shared_ptr<SimulatedCloud> cloud;
+    std::shared_ptr<SimulatedApps> apps = std::make_shared<SimulatedApps>();
     std::shared_ptr<SimulatedOffers> offers = std::make_shared<SimulatedOffers>();
     std::shared_ptr<platform::ui::Window> window;
     std::shared_ptr<tarrow::NavController> browser;

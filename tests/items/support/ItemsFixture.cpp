@@ -20,6 +20,7 @@ ItemsFixture::ItemsFixture()
     coordinator =
         std::make_shared<DecoratedCoordinator>(std::make_shared<host::system::LocalFileCoordinator>());
     platform::ServiceSet set;
+    set.appRegistry = apps;
     set.characterData = std::make_shared<host::system::UnicodeCharacterData>();
     set.cloudDocumentService = decorated;
     set.dispatch = dispatch;

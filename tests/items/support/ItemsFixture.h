@@ -5,6 +5,7 @@
 #include "platform/PreviewSupport.h"
 #include "tests/items/support/DecoratedCloud.h"
 #include "tests/support/DriveFixture.h"
+#include "tests/support/SimulatedApps.h"
 
 #include <gtest/gtest.h>
 
@@ -38,6 +39,7 @@ protected:
 
     std::shared_ptr<DecoratedCloud> decorated;
     std::shared_ptr<DecoratedCoordinator> coordinator;
+    std::shared_ptr<testing_support::SimulatedApps> apps = std::make_shared<testing_support::SimulatedApps>();
     std::shared_ptr<DirectedTexts> texts = std::make_shared<DirectedTexts>();
 };
 

@@ -1,0 +1,40 @@
+#pragma once
+
+#include "platform/AppRegistry.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+
+typedef struct _GAppLaunchContext GAppLaunchContext;
+
+namespace host::system {
+
+class MimeTypeRegistry;
+
+/// The desktop entries of this machine. The person's default app for a document's MIME type ranks "Owner",
+/// when it claims that very type, and so does an app whose entry lists the type under "X-Tarrow-OwnedTypes";
+/// other claimants rank "Alternate". An app opens documents in place when its command takes files or URLs and
+/// needs no terminal.
+class GioAppRegistry : public platform::AppRegistry {
+public:
+    /// Makes what a launch needs to bring the app's window to the front; null: nothing.
+    using LaunchContext = std::function<std::shared_ptr<GAppLaunchContext>()>;
+
+    GioAppRegistry(std::shared_ptr<const MimeTypeRegistry> types, std::string ownIdentifier,
+        LaunchContext launchContext = {});
+
+    std::vector<platform::RankedApps> availableApps(const platform::DocumentHandle& document) const override;
+    std::optional<platform::AppHandle> appWithBundleIdentifier(const std::string& identifier) const override;
+    std::string ownBundleIdentifier() const override { return _ownIdentifier; }
+    bool openInPlace(const platform::Url& document, const platform::AppHandle& app) override;
+
+private:
+    std::optional<std::string> mimeTypeOf(const platform::Url& url) const;
+
+    std::shared_ptr<const MimeTypeRegistry> _types;
+    std::string _ownIdentifier;
+    LaunchContext _launchContext;
+};
+
+} // namespace host::system
