@@ -82,6 +82,12 @@ bool extensionHidden(const ItemFacts& facts)
     return isPromised(facts) ? facts.promise.extensionHidden : facts.marks.extensionHidden;
 }
 
+// The extensions of the drive's own small files mean nothing to a person.
+bool standsForAnother(std::string_view extension)
+{
+    return extension == system::referenceExtension || extension == system::aliasExtension;
+}
+
 // The extension as Url::pathExtension() has it, without a copy of the name: this is asked for every row.
 std::string_view extensionOf(const std::string& path)
 {
@@ -182,7 +188,8 @@ std::string ItemAttributes::localizedName(const Url& url, const ItemFacts& facts
             return _localization->text(std::string(below.substr(1)));
     }
     auto name = url.lastPathComponent();
-    if (const auto extension = extensionOf(url.path()); extensionHidden(facts) && !extension.empty())
+    if (const auto extension = extensionOf(url.path());
+        !extension.empty() && (extensionHidden(facts) || standsForAnother(extension)))
         name.resize(name.size() - extension.size() - 1);
     return displayable(std::move(name));
 }

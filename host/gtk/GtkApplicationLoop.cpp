@@ -267,7 +267,10 @@ void GtkApplicationLoop::launch(std::optional<ShortcutItem> shortcut)
     }
     gtk_widget_set_default_direction(
         platform::services().localization().isRightToLeft() ? GTK_TEXT_DIR_RTL : GTK_TEXT_DIR_LTR);
-    _windowHost = std::make_shared<GtkWindowHost>(_application.get(), storedSize(_stateFile));
+    auto size = storedSize(_stateFile);
+    // A browser's page is the whole screen of its window.
+    size.isMaximized = size.isMaximized || _broadway;
+    _windowHost = std::make_shared<GtkWindowHost>(_application.get(), size);
     _windowHost->setOnShow([this](WindowPeer& window) { windowShown(window); });
     platform::ui::WindowHost::install(_windowHost);
     _delegate = _makeDelegate();
