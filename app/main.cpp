@@ -61,7 +61,6 @@ ServiceSet systemServices(const std::string& executable, const UserLocale& local
     set.characterData = std::make_shared<host::system::UnicodeCharacterData>();
     set.dispatch = std::make_shared<host::system::GLibDispatch>();
     set.notificationCenter = std::make_shared<platform::NotificationCenter>();
-    set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
     const auto types = std::make_shared<host::system::MimeTypeRegistry>();
     set.typeRegistry = types;
     set.appRegistry = std::make_shared<host::system::GioAppRegistry>(
@@ -82,6 +81,7 @@ DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale)
         {set.dispatch, set.notificationCenter, set.typeRegistry, set.localization, set.linkOpener},
         {.languages = locale.languageList()});
     set.cloudDocumentService = cloud;
+    set.fileSystem = std::make_shared<host::system::PosixFileSystem>(cloud->itemChanges());
     set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>(
         host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination()});
     set.storageOfferManager = cloud->storageOffers();

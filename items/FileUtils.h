@@ -10,7 +10,10 @@
 
 namespace tarrow {
 
-/// Questions about a file that change nothing. Any thread; nothing is downloaded to answer.
+/// What is done to files, and questions about them that change nothing.
+///
+/// Any thread; nothing is downloaded. What changes an item blocks until other readers and writers, in any
+/// process, let it, and never shows anything itself: it answers the error, or nothing.
 class FileUtils {
 public:
     FileUtils() = delete;
@@ -54,6 +57,17 @@ public:
     /// Where an item lies, as a line for the screen: the drive, the app library and the folders, without the
     /// item's own name. Nothing when the location cannot be split.
     static std::optional<std::string> displayableLocationForURL(const Url& url);
+
+    /// Makes a folder, and those on the way to it that are missing.
+    static std::optional<Error> mkdir(const Url& url);
+    /// Deletes an item for good, unless it was changed since this was called: then it is kept, and
+    /// FileErrorCode::Cancelled answered.
+    static std::optional<Error> remove(const Url& url);
+    /// Moves an item to a new location, its name included; so it renames, too. Moving it to where it is does
+    /// nothing. FileErrorCode::Unsupported when a folder is at a file's new location or a file at a folder's.
+    static std::optional<Error> moveTo(const Url& source, const Url& destination);
+    /// Removes the downloaded copy of a cloud item. Whether no error was reported.
+    static bool evictDocument(const Url& url);
 };
 
 } // namespace tarrow

@@ -22,6 +22,11 @@ public:
     /// The path with every symbolic link in it resolved as far as it exists. Any thread.
     virtual Url realURL(const Url& url) const = 0;
 
+    /// Removes the downloaded copy of a document and keeps it in the cloud; one that is only promised is no
+    /// error. Errors: FileErrorCode::NoSuchItem, FileErrorCode::Unsupported for what is no document,
+    /// FileErrorCode::Cancelled for one that changes meanwhile, else the system's. Any thread.
+    virtual std::optional<Error> evictItem(const Url& url) = 0;
+
     /// Finds the document that a bookmark string from another device names. The completion is called once, on
     /// any thread, with the URL or the error (damaged, too large, unknown account or document).
     virtual void decodeBookmark(

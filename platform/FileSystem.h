@@ -3,6 +3,7 @@
 #include "platform/Attributes.h"
 #include "platform/Error.h"
 
+#include <cstdint>
 #include <functional>
 #include <optional>
 #include <string>
@@ -20,7 +21,16 @@ struct FileAttributes {
     bool extensionHidden = false;
 };
 
-/// The plain file system, without promises and without coordination. Any thread; every call is synchronous.
+/// Which state of which item was looked at: while two looks are equal, nothing changed it in between.
+struct ItemVersion {
+    std::uint64_t device = 0, inode = 0;
+    std::uint64_t size = 0; ///< bytes
+    std::int64_t modified = 0, changed = 0; ///< nanoseconds since 1970: of the content, of anything
+    bool operator==(const ItemVersion&) const = default;
+};
+
+/// The file system, without coordination. Questions know nothing of promises; changes take a promise for the
+/// item that it stands for, stay within the drive and follow no link. Any thread; every call is synchronous.
 class FileSystem {
 public:
     virtual ~FileSystem() = default;
@@ -44,6 +54,19 @@ public:
     virtual void enumerateShallowly(const Url& folder,
         const std::function<Continue(const Url&, FileType)>& entry,
         const std::function<Continue(const Url&, const Error&)>& error) const = 0;
+
+    /// The version of an item, or of its promise; nothing when neither is there.
+    virtual std::optional<ItemVersion> versionOfItem(const std::string& path) const = 0;
+    /// Makes a folder and those on the way to it that are missing. One that is there already is no error.
+    virtual std::optional<Error> createFolder(const std::string& path) = 0;
+    /// Removes an item for good, a folder with everything in it, a link and not its target. An item that is
+    /// not `unchangedSince` any more, or changes while it is being removed, is kept
+    /// (FileErrorCode::Cancelled).
+    virtual std::optional<Error> removeItem(
+        const std::string& path, const std::optional<ItemVersion>& unchangedSince) = 0;
+    /// Moves an item to a location, its new name included. Nothing is ever replaced
+    /// (FileErrorCode::ItemExists), and the item is whole under one of its names at every moment.
+    virtual std::optional<Error> moveItem(const std::string& from, const std::string& to) = 0;
 };
 
 } // namespace platform

@@ -29,6 +29,8 @@ public:
     std::string keyValueStore() const { return _home + '/' + std::string(keyValueFileName); }
     std::string index() const { return _home + "/index.sqlite"; } ///< document identifiers
     std::string cloud() const { return _home + "/cloud"; } ///< contents of what is not downloaded
+    /// Items that are being removed, each under a private name.
+    std::string held() const { return _home + "/held"; }
     /// Where the processes that use the drive exclude each other; its content is never read.
     std::string coordination() const { return _home + "/locks/coordination"; }
     /// What the application keeps between runs: defaults and saved interface state.

@@ -1,5 +1,7 @@
 #include "host/drive/LocalCloudDocumentService.h"
 
+#include "host/drive/HeldItem.h"
+
 namespace host::drive {
 
 std::shared_ptr<LocalCloudDocumentService> LocalCloudDocumentService::create(
@@ -19,10 +21,12 @@ LocalCloudDocumentService::LocalCloudDocumentService(
               layout.defaultContainerURL()),
           ThumbnailCache::create(settings.thumbnailFolder, dependencies.dispatch))
     , _items(layout, dependencies.dispatch)
+    , _itemChanges(std::make_shared<LocalItemChanges>(layout))
     , _storageOffers(LocalStorageOfferManager::create(layout, dependencies))
     , _keyValueStore(LocalKeyValueStore::create(layout, dependencies))
     , _monitor(AccountMonitor::start(layout, dependencies))
 {
+    HeldItem::restoreAll(layout);
     _monitor->onFileChanged([weak = std::weak_ptr(_storageOffers)] {
         if (const auto offers = weak.lock())
             offers->accountFileChanged();

@@ -5,6 +5,7 @@
 #include "host/drive/LocalAccount.h"
 #include "host/drive/LocalCloudItems.h"
 #include "host/drive/LocalContainers.h"
+#include "host/drive/LocalItemChanges.h"
 #include "host/drive/LocalKeyValueStore.h"
 #include "host/drive/LocalPromisedItems.h"
 #include "host/drive/LocalStorageOfferManager.h"
@@ -27,6 +28,8 @@ public:
         const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings);
 
     const DriveLayout& layout() const { return _layout; }
+    /// What changes the drive's items; for the file system that is installed beside this service.
+    std::shared_ptr<LocalItemChanges> itemChanges() const { return _itemChanges; }
     /// The account's storage offer; it follows the same file.
     const std::shared_ptr<LocalStorageOfferManager>& storageOffers() const { return _storageOffers; }
     /// The values that the account's devices share.
@@ -51,6 +54,7 @@ private:
     std::shared_ptr<LocalContainers> _containers;
     LocalPromisedItems _promisedItems;
     LocalCloudItems _items;
+    std::shared_ptr<LocalItemChanges> _itemChanges;
     std::shared_ptr<LocalStorageOfferManager> _storageOffers;
     std::shared_ptr<LocalKeyValueStore> _keyValueStore;
     std::shared_ptr<AccountMonitor> _monitor;

@@ -5,6 +5,7 @@
 #include "host/drive/Bookmark.h"
 #include "host/drive/ItemFacts.h"
 #include "host/drive/LinkRecords.h"
+#include "host/drive/LocalItemChanges.h"
 #include "host/drive/RealPath.h"
 #include "host/drive/SmallFile.h"
 
@@ -109,6 +110,11 @@ Url LocalCloudItems::realURL(const Url& url) const
 {
     const auto real = url.isFileURL() ? realPath(url.path()) : std::nullopt;
     return real && *real != url.path() ? Url::fileURL(*real) : url;
+}
+
+std::optional<Error> LocalCloudItems::evictItem(const Url& url)
+{
+    return LocalItemChanges(_layout).evictItem(url.path());
 }
 
 std::optional<Url> LocalCloudItems::documentWithIdentifier(std::uint32_t identifier) const

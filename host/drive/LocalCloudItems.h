@@ -17,6 +17,7 @@ public:
     bool isInDocumentsArea(const platform::Url& url) const override;
     bool isInTrash(const platform::Url& url) const override;
     platform::Url realURL(const platform::Url& url) const override;
+    std::optional<platform::Error> evictItem(const platform::Url& url) override;
     void decodeBookmark(const std::string& bookmark,
         std::function<void(platform::Result<platform::Url>)> completion) const override;
     std::optional<platform::Url> documentWithIdentifier(std::uint32_t identifier) const override;

@@ -114,4 +114,25 @@ void PosixFileSystem::enumerateShallowly(const platform::Url& folder,
         error(folder, systemError(reader.errorNumber(), folder.path()));
 }
 
+std::optional<platform::ItemVersion> PosixFileSystem::versionOfItem(const std::string& path) const
+{
+    return _changes ? _changes->versionOfItem(path) : std::nullopt;
+}
+
+std::optional<platform::Error> PosixFileSystem::createFolder(const std::string& path)
+{
+    return _changes ? _changes->createFolder(path) : systemError(EROFS, path);
+}
+
+std::optional<platform::Error> PosixFileSystem::removeItem(
+    const std::string& path, const std::optional<platform::ItemVersion>& unchangedSince)
+{
+    return _changes ? _changes->removeItem(path, unchangedSince) : systemError(EROFS, path);
+}
+
+std::optional<platform::Error> PosixFileSystem::moveItem(const std::string& from, const std::string& to)
+{
+    return _changes ? _changes->moveItem(from, to) : systemError(EROFS, from, to);
+}
+
 } // namespace host::system

@@ -66,13 +66,12 @@ DriveFixture::DriveFixture()
     set.dispatch = dispatch;
     set.notificationCenter = notifications;
     // Presenters answer on queues that only this thread drives.
-    set.fileCoordinator =
+    fileCoordinator =
         std::make_shared<host::system::LocalFileCoordinator>(host::system::LocalFileCoordinator::Settings{
             .lockFile = layout.coordination(), .beforeWaiting = [queues = std::weak_ptr(dispatch)] {
                 if (const auto all = queues.lock())
                     all->runUntilIdle();
             }});
-    set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
     set.characterData = std::make_shared<host::system::UnicodeCharacterData>();
     set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
     set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
@@ -86,8 +85,10 @@ DriveFixture::DriveFixture()
     cloud = host::drive::LocalCloudDocumentService::create(
         layout, dependencies, {{"en"}, _folder.at("thumbnails")});
     set.cloudDocumentService = cloud;
+    set.fileSystem = std::make_shared<host::system::PosixFileSystem>(cloud->itemChanges());
     set.storageOfferManager = cloud->storageOffers();
     set.keyValueStore = cloud->keyValueStore();
+    set.fileCoordinator = fileCoordinator;
     platform::installServices(std::move(set));
 }
 

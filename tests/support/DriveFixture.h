@@ -2,6 +2,7 @@
 
 #include "host/drive/LocalCloudDocumentService.h"
 #include "host/drive/PromiseRecord.h"
+#include "platform/FileCoordinator.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Services.h"
 #include "tests/support/RecordingLog.h"
@@ -61,6 +62,8 @@ private:
 public:
     /// The service under the installed set's cloudDocumentService.
     std::shared_ptr<host::drive::LocalCloudDocumentService> cloud;
+    /// The installed set's fileCoordinator; what presenters are asked runs before the writer waits.
+    std::shared_ptr<platform::FileCoordinator> fileCoordinator;
 };
 
 } // namespace testing_support

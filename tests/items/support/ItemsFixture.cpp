@@ -1,7 +1,6 @@
 #include "tests/items/support/ItemsFixture.h"
 
 #include "host/system/IcuFormatters.h"
-#include "host/system/LocalFileCoordinator.h"
 #include "host/system/MimeTypeRegistry.h"
 #include "host/system/PosixFileSystem.h"
 #include "host/system/ThreadedFolderLister.h"
@@ -17,15 +16,14 @@ namespace items_tests {
 ItemsFixture::ItemsFixture()
 {
     decorated = std::make_shared<DecoratedCloud>(DriveFixture::cloud);
-    coordinator =
-        std::make_shared<DecoratedCoordinator>(std::make_shared<host::system::LocalFileCoordinator>());
+    coordinator = std::make_shared<DecoratedCoordinator>(fileCoordinator);
     platform::ServiceSet set;
     set.appRegistry = apps;
     set.characterData = std::make_shared<host::system::UnicodeCharacterData>();
     set.cloudDocumentService = decorated;
     set.dispatch = dispatch;
     set.fileCoordinator = coordinator;
-    set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
+    set.fileSystem = std::make_shared<host::system::PosixFileSystem>(DriveFixture::cloud->itemChanges());
     set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
     set.localization = texts;
     set.notificationCenter = notifications;

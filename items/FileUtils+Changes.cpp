@@ -1,0 +1,150 @@
+#include "items/FileUtils.h"
+
+#include "platform/FileCoordinator.h"
+#include "platform/FileSystem.h"
+
+namespace tarrow {
+
+namespace {
+
+using platform::WritingOptions;
+
+platform::FileCoordinator& coordinator()
+{
+    return services().fileCoordinator();
+}
+
+platform::FileSystem& files()
+{
+    return services().fileSystem();
+}
+
+std::optional<Date> modificationDate(const Url& url)
+{
+    const auto value = FileUtils::getResourceValueForURL(AttributeKey::ContentModificationDate, url);
+    const auto* date = value ? std::get_if<Date>(&*value) : nullptr;
+    return date ? std::optional(*date) : std::nullopt;
+}
+
+/// What an item was when its deletion was asked for.
+struct KnownState {
+    std::optional<Date> date;
+    std::optional<platform::ItemVersion> version;
+};
+
+/// The accessor of a deletion: removes what is still as it was.
+std::optional<Error> removeUnchanged(const Url& location, const KnownState& before)
+{
+    static constexpr Operation op{"+[FileUtils remove:]"};
+    const auto date = modificationDate(location);
+    std::optional<Error> error = Error(FileErrorCode::Cancelled);
+    if (date && date == before.date)
+        error = files().removeItem(location.path(), before.version);
+    if (!error)
+        op.info("Deleted item: '%@'", location);
+    else if (error->is(FileErrorCode::Cancelled))
+        op.info("Date changed during delete (user chose Keep?) -- preserving document: '%@'", location);
+    else
+        op.error("failed to delete item:'%@': %@", location, *error);
+    return error;
+}
+
+/// The accessor of a move.
+std::optional<Error> moveAnnounced(const Url& source, const Url& destination)
+{
+    static constexpr Operation op{"+[FileUtils move:to:]"};
+    coordinator().itemWillMove(source, destination);
+    op.debug("Moving src2:  '%@'", source);
+    op.debug("Moving dest2: '%@'", destination);
+    auto error = files().moveItem(source.path(), destination.path());
+    if (error) {
+        op.warning("KD Move failed: %@", *error);
+        return error;
+    }
+    op.info("Move successful");
+    coordinator().itemDidMove(source, destination);
+    return std::nullopt;
+}
+
+/// Why the kinds of what is at both ends do not allow a move.
+std::optional<Error> refuseKinds(const Url& source, const Url& destination)
+{
+    static constexpr Operation op{"+[FileUtils move:to:]"};
+    if (!FileUtils::exists(source))
+        op.info("Move: source filename does not exist, must be a fault.");
+    if (FileUtils::isFile(source) && FileUtils::isDir(destination)) {
+        op.error("Move: must move a file to a file (dest is a dir)");
+        return Error(FileErrorCode::Unsupported);
+    }
+    if (FileUtils::isDir(source) && FileUtils::isFile(destination)) {
+        op.error("Move: must move a dir to a dir (dest is a file)");
+        return Error(FileErrorCode::Unsupported);
+    }
+    return std::nullopt;
+}
+
+} // namespace
+
+std::optional<Error> FileUtils::mkdir(const Url& url)
+{
+    static constexpr Operation op{"+[FileUtils mkdir:]"};
+    op.debug("Creating directory: '%@'", url);
+    std::optional<Error> failed;
+    const auto refused = coordinator().coordinateWriting(url, WritingOptions::None, [&](const Url& location) {
+        failed = files().createFolder(location.path());
+        if (failed)
+            op.error("failed to create directory:'%@': %@", location, *failed);
+        else
+            op.info("Created directory: '%@'", location);
+    });
+    auto result = refused ? refused : failed;
+    op.debug("Coordinated Write returned %@", result);
+    return result;
+}
+
+std::optional<Error> FileUtils::remove(const Url& url)
+{
+    static constexpr Operation op{"+[FileUtils remove:]"};
+    op.debug("Removing item: '%@'", url);
+    // The version is looked at first: a change between the two looks is then seen in the date.
+    const auto version = files().versionOfItem(url.path());
+    const KnownState before{modificationDate(url), version};
+    std::optional<Error> failed;
+    const auto refused = coordinator().coordinateWriting(url, WritingOptions::ForDeleting,
+        [&](const Url& location) { failed = removeUnchanged(location, before); });
+    auto result = refused ? refused : failed;
+    op.info("Coordinated Write returned %@", result);
+    return result;
+}
+
+std::optional<Error> FileUtils::moveTo(const Url& source, const Url& destination)
+{
+    static constexpr Operation op{"+[FileUtils move:to:]"};
+    op.debug("Moving src1:  '%@'", source);
+    op.debug("Moving dest1: '%@'", destination);
+    if (source.path() == destination.path()) {
+        op.debug("Move: src and dest are the same");
+        return std::nullopt;
+    }
+    if (auto refused = refuseKinds(source, destination))
+        return refused;
+    std::optional<Error> failed;
+    const auto refused = coordinator().coordinateWriting(source, WritingOptions::ForMoving, destination,
+        WritingOptions::ForReplacing,
+        [&](const Url& from, const Url& to) { failed = moveAnnounced(from, to); });
+    auto result = refused ? refused : failed;
+    if (result)
+        op.warning("Move failed: %@", *result);
+    return result;
+}
+
+bool FileUtils::evictDocument(const Url& url)
+{
+    static constexpr Operation op{"+[FileUtils evictDocument:]"};
+    const auto error = services().cloudDocumentService().items().evictItem(url);
+    if (error)
+        op.warning("Evict error: %@", *error);
+    return !error;
+}
+
+} // namespace tarrow

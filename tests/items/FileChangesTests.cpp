@@ -1,0 +1,282 @@
+#include "items/FileUtils.h"
+#include "platform/FilePresenter.h"
+#include "tests/items/support/ItemsFixture.h"
+
+#include <gmock/gmock.h>
+
+#include <sys/stat.h>
+
+#include <cerrno>
+#include <filesystem>
+#include <fstream>
+
+using namespace tarrow;
+using items_tests::ItemsFixture;
+using items_tests::writeFile;
+using testing::ElementsAre;
+using testing::StartsWith;
+
+namespace {
+
+namespace fs = std::filesystem;
+
+/// Does something at the moment at which a presenter of the item is asked to prepare for the change.
+class ActingPresenter : public platform::FilePresenter {
+public:
+    ActingPresenter(Url url, std::shared_ptr<platform::OperationQueue> queue, std::function<void()> act)
+        : _url(std::move(url))
+        , _queue(std::move(queue))
+        , _act(std::move(act))
+    {
+    }
+    std::optional<Url> presentedItemURL() override { return _url; }
+    std::shared_ptr<platform::OperationQueue> presentedItemOperationQueue() override { return _queue; }
+    void presentedItemWillMoveToURL(const Url&) override { _act(); }
+    void presentedItemDidMoveToURL(const Url& url) override { movedTo = url; }
+    void accommodatePresentedItemDeletionWithCompletionHandler(CompletionHandler completion) override
+    {
+        _act();
+        completion(std::nullopt);
+    }
+    std::optional<Url> movedTo;
+
+private:
+    Url _url;
+    std::shared_ptr<platform::OperationQueue> _queue;
+    std::function<void()> _act;
+};
+
+class FileChangesTest : public ItemsFixture {
+protected:
+    std::shared_ptr<ActingPresenter> whenAsked(const Url& url, std::function<void()> act)
+    {
+        const auto presenter = std::make_shared<ActingPresenter>(url, _queue, std::move(act));
+        coordinator->addFilePresenter(presenter);
+        return presenter;
+    }
+    static bool isThere(const Url& url)
+    {
+        return fs::symlink_status(url.path()).type() != fs::file_type::not_found;
+    }
+    static Url promiseOf(const Url& url)
+    {
+        return Url::fileURL(host::drive::PromiseRecord::pathFor(url.path()));
+    }
+    static std::string contentOf(const Url& url)
+    {
+        std::ifstream file(url.path());
+        return {std::istreambuf_iterator<char>(file), {}};
+    }
+    /// Nothing of the work on items is left over.
+    void expectNoTraces() const
+    {
+        for (const auto& entry : fs::recursive_directory_iterator(layout().home()))
+            EXPECT_FALSE(entry.path().filename().string().starts_with(".trw")) << entry.path();
+    }
+    Url outside(const std::string& name) { return writeFile(folder().at("outside/" + name), "precious"); }
+
+    std::shared_ptr<platform::OperationQueue> _queue =
+        dispatch->makeOperationQueue("presenters", platform::QualityOfService::Utility);
+};
+
+MATCHER_P(HasCode, code, "")
+{
+    return arg && arg->code() == static_cast<int>(code);
+}
+
+TEST_F(FileChangesTest, MakesAFolderAndThoseOnTheWay)
+{
+    const auto url = at("Documents/a/b/c");
+    log->clear();
+    EXPECT_FALSE(FileUtils::mkdir(url));
+    EXPECT_THAT(log->lines(),
+        ElementsAre("DEBUG Creating directory: '" + url.absoluteString() + "'",
+            "INFO Created directory: '" + url.absoluteString() + "'",
+            StartsWith("DEBUG Coordinated Write returned ")));
+    EXPECT_TRUE(FileUtils::isDir(url));
+    EXPECT_FALSE(FileUtils::mkdir(url)) << "a folder that is there is made";
+
+    const auto file = writeDocument("file");
+    fs::create_directory_symlink(folder().path(), at("out").path());
+    struct Row {
+        Url url;
+        int code;
+    };
+    for (const auto& [refused, code] :
+        {Row{file, 516}, Row{at("file/a"), 516}, Row{at("out/a"), 516}, Row{at(std::string(256, 'n')), 514},
+            Row{at("../../../a"), EINVAL}, Row{Url::fileURL(folder().at("a")), EXDEV}}) {
+        log->clear();
+        EXPECT_THAT(FileUtils::mkdir(refused), HasCode(code)) << refused.path();
+        EXPECT_THAT(log->lines(), testing::Contains(StartsWith("ERROR failed to create directory:'")));
+    }
+    EXPECT_FALSE(fs::exists(folder().at("a")));
+}
+
+TEST_F(FileChangesTest, RemovesWhatItWasAskedToAndNothingElse)
+{
+    const auto kept = outside("kept.txt");
+    const auto file = writeDocument("a.txt"), tree = makeFolder("tree");
+    writeDocument("tree/sub/deep/b.txt");
+    writeDocument("tree/.hidden");
+    writeLink("tree/sub/link", folder().at("outside"));
+    const auto link = writeLink("link", folder().at("outside"));
+    host::drive::PromiseRecord promise;
+    promise.modified = Date{1'600'000'000'000'000'000};
+    promise.content = "content-1";
+    const auto promised = writePromise("p.pdf", promise);
+    const auto content = writeFile(layout().cloud() + "/content-1", "cloud");
+    const auto twin = writePromise("a.txt", {});
+
+    for (const auto& url : {file, tree, link, promised}) {
+        log->clear();
+        EXPECT_FALSE(FileUtils::remove(url)) << url.path();
+        EXPECT_THAT(log->lines(),
+            ElementsAre("DEBUG Removing item: '" + url.absoluteString() + "'",
+                "INFO Deleted item: '" + url.absoluteString() + "'",
+                StartsWith("INFO Coordinated Write returned ")));
+        EXPECT_FALSE(isThere(url) || isThere(promiseOf(url))) << url.path();
+    }
+    EXPECT_FALSE(isThere(content));
+    EXPECT_EQ(contentOf(kept), "precious");
+    expectNoTraces();
+    // Nothing there has no date, so nothing says that it is unchanged.
+    EXPECT_THAT(FileUtils::remove(file), HasCode(FileErrorCode::Cancelled));
+}
+
+TEST_F(FileChangesTest, KeepsADocumentThatChangedWhileItWasBeingDeleted)
+{
+    const auto url = writeDocument("a.txt", "old");
+    const auto rewrite = [&] { writeFile(url.path(), "new"); };
+    const auto replaceWithItsDate = [&] {
+        const auto date = fs::last_write_time(url.path());
+        writeFile(url.path() + "~", "two");
+        fs::last_write_time(url.path() + "~", date);
+        fs::rename(url.path() + "~", url.path());
+    };
+    for (const auto& [change, content] :
+        {std::pair<std::function<void()>, std::string>{rewrite, "new"}, {replaceWithItsDate, "two"}}) {
+        const auto writer = whenAsked(url, change);
+        log->clear();
+        EXPECT_THAT(FileUtils::remove(url), HasCode(FileErrorCode::Cancelled));
+        EXPECT_EQ(log->count("INFO Date changed during delete (user chose Keep?) -- preserving document: '"
+                      + url.absoluteString() + "'"),
+            1U);
+        EXPECT_EQ(contentOf(url), content);
+    }
+    EXPECT_FALSE(FileUtils::remove(url));
+}
+
+TEST_F(FileChangesTest, MovesOnlyToAFreePlaceOfTheSameKind)
+{
+    const auto file = writeDocument("a.txt", "a"), other = writeDocument("b.txt", "b");
+    const auto dir = makeFolder("dir"), otherDir = makeFolder("dir2"), gone = at("gone");
+    const auto promised = writePromise("p.txt", {});
+    const auto link = writeLink("dangling", "nowhere");
+    struct Row {
+        Url from, to;
+        int code;
+    };
+    for (const auto& [from, to, code] :
+        {Row{file, dir, 3328}, Row{dir, file, 3328}, Row{file, other, 516}, Row{dir, otherDir, 516},
+            Row{file, promised, 516}, Row{promised, file, 516}, Row{file, link, 516},
+            Row{dir, dir.appendingPathComponent("in"), EINVAL}, Row{gone, at("new"), 4},
+            Row{file, at("gone/a.txt"), 4}, Row{file, at(std::string(256, 'n')), 514},
+            Row{file, Url::fileURL(folder().at("a.txt")), EXDEV}}) {
+        const auto error = FileUtils::moveTo(from, to);
+        EXPECT_THAT(error, HasCode(code)) << from.path() << " to " << to.path();
+        log->clear();
+    }
+    EXPECT_FALSE(FileUtils::moveTo(file, file));
+    EXPECT_EQ(log->count("DEBUG Move: src and dest are the same"), 1U);
+    EXPECT_EQ(contentOf(file), "a");
+    EXPECT_EQ(contentOf(other), "b");
+    EXPECT_TRUE(isThere(promiseOf(promised)) && FileUtils::isDir(dir));
+    expectNoTraces();
+}
+
+TEST_F(FileChangesTest, MovesAnItemAndTellsItsPresenters)
+{
+    const auto from = makeFolder("from"), to = at("Documents/to");
+    const auto document = writeDocument("from/a.txt", "a");
+    bool wasThere = false;
+    const auto presenter = whenAsked(document, [&] { wasThere = isThere(document); });
+    log->clear();
+    EXPECT_FALSE(FileUtils::moveTo(from, to));
+    EXPECT_THAT(log->lines(),
+        ElementsAre("DEBUG Moving src1:  '" + from.absoluteString() + "'",
+            "DEBUG Moving dest1: '" + to.absoluteString() + "'",
+            "DEBUG Moving src2:  '" + from.absoluteString() + "'",
+            "DEBUG Moving dest2: '" + to.absoluteString() + "'", "INFO Move successful"));
+    dispatch->runUntilIdle();
+    EXPECT_TRUE(wasThere);
+    EXPECT_EQ(presenter->movedTo, at("Documents/to/a.txt"));
+    EXPECT_EQ(contentOf(at("Documents/to/a.txt")), "a");
+    EXPECT_FALSE(isThere(from));
+}
+
+TEST_F(FileChangesTest, MovesAPromiseAsAPromise)
+{
+    host::drive::PromiseRecord promise;
+    promise.size = 77;
+    promise.documentIdentifier = 5;
+    promise.tags = {"Red"};
+    const auto from = writePromise("a.pdf", promise), to = at("Documents/b.pdf");
+    log->clear();
+    EXPECT_FALSE(FileUtils::moveTo(from, to));
+    EXPECT_EQ(log->count("INFO Move: source filename does not exist, must be a fault."), 1U);
+    EXPECT_FALSE(isThere(promiseOf(from)));
+    EXPECT_FALSE(isThere(to));
+    EXPECT_EQ(
+        FileUtils::getResourceValueForURL(AttributeKey::FileSize, to), AttributeValue(std::uint64_t{77}));
+    EXPECT_EQ(DriveFixture::cloud->promisedItems().tagNames(to).value, promise.tags);
+}
+
+TEST_F(FileChangesTest, AFolderSwappedForALinkLeadsNowhere)
+{
+    const auto kept = outside("a.txt");
+    const auto swap = [&](const Url& folder) {
+        fs::rename(folder.path(), folder.path() + ".away");
+        fs::create_directory_symlink(kept.deletingLastPathComponent().path(), folder.path());
+    };
+    const auto document = writeDocument("from/a.txt", "a"), free = writeDocument("b.txt", "b");
+    const auto target = makeFolder("to");
+    // The outside file looks the same, so that only the link is in the way.
+    fs::last_write_time(kept.path(), fs::last_write_time(document.path()));
+
+    const auto mover = whenAsked(free, [&] { swap(target); });
+    EXPECT_THAT(FileUtils::moveTo(free, target.appendingPathComponent("b.txt")), HasCode(ENOTDIR));
+    const auto remover = whenAsked(document, [&] { swap(at("from")); });
+    EXPECT_TRUE(FileUtils::remove(document));
+    EXPECT_EQ(contentOf(kept), "precious");
+    EXPECT_FALSE(fs::exists(folder().at("outside/b.txt")));
+    EXPECT_EQ(contentOf(at("from.away/a.txt")), "a");
+    EXPECT_EQ(contentOf(free), "b");
+}
+
+TEST_F(FileChangesTest, EvictsADocumentAndKeepsWhatIsKnownOfIt)
+{
+    const auto url = writeDocument("a.txt", "12345");
+    mark(url, host::drive::itemMark::tags, "Red,Blue");
+    const auto date = FileUtils::getResourceValueForURL(AttributeKey::ContentModificationDate, url);
+    EXPECT_TRUE(FileUtils::evictDocument(url));
+    EXPECT_FALSE(isThere(url));
+    EXPECT_EQ(
+        FileUtils::getResourceValueForURL(AttributeKey::FileSize, url), AttributeValue(std::uint64_t{5}));
+    EXPECT_EQ(FileUtils::getResourceValueForURL(AttributeKey::ContentModificationDate, url), date);
+    EXPECT_THAT(DriveFixture::cloud->promisedItems().tagNames(url).value,
+        testing::Optional(ElementsAre("Red", "Blue")));
+    const auto promise = host::drive::PromiseRecord::parse(contentOf(promiseOf(url)));
+    ASSERT_TRUE(promise);
+    EXPECT_EQ(contentOf(Url::fileURL(layout().cloud() + '/' + promise->content)), "12345");
+    EXPECT_TRUE(FileUtils::evictDocument(url)) << "there is no copy any more";
+
+    log->clear();
+    EXPECT_FALSE(FileUtils::evictDocument(makeFolder("dir")));
+    EXPECT_FALSE(FileUtils::evictDocument(at("gone")));
+    EXPECT_THAT(
+        log->lines(), ElementsAre(StartsWith("WARNING Evict error: "), StartsWith("WARNING Evict error: ")));
+    EXPECT_FALSE(FileUtils::remove(url)) << "a promise with its date";
+    EXPECT_TRUE(fs::is_empty(layout().cloud()));
+}
+
+} // namespace
