@@ -88,20 +88,29 @@ int HeldItem::take(const DriveLayout& layout, const DriveEntry& entry, const std
     item._originName = name;
     item._path = entry.path;
     item._name = uniqueName(".trwheld-");
-    const auto originFolder = entry.path.substr(0, entry.path.rfind('/') + 1);
-    item._recordPath = layout.held() + '/' + item._name + std::string(recordSuffix);
-    const auto record =
-        originFolder + name + '\0' + (item._isAside ? layout.held() + '/' : originFolder) + item._name;
-    item._record =
-        FileDescriptor(::open(item._recordPath.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0600));
-    if (!item._record || !lockWhole(item._record)
-        || ::write(item._record.get(), record.data(), record.size()) != static_cast<ssize_t>(record.size()))
-        return errno;
+    if (const int failure = item.writeRecord(layout); failure != 0)
+        return failure;
     if (const int failure = renameEntry(item._origin, name, item.folder(), item._name); failure != 0)
         return failure;
     item._isThere = true;
     held.emplace(std::move(item));
     return 0;
+}
+
+int HeldItem::writeRecord(const DriveLayout& layout)
+{
+    const auto originFolder = _path.substr(0, _path.rfind('/') + 1);
+    const auto record =
+        originFolder + _originName + '\0' + (_isAside ? layout.held() + '/' : originFolder) + _name;
+    _recordPath = layout.held() + '/' + _name + std::string(recordSuffix);
+    _record = FileDescriptor(::open(_recordPath.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0600));
+    if (_record && !lockWhole(_record))
+        return errno;
+    const auto written = _record ? ::write(_record.get(), record.data(), record.size()) : -1;
+    // On a full disk something must be removable still: it is then held without a record.
+    if (written >= 0 || errno == ENOSPC || errno == EDQUOT)
+        return 0;
+    return errno;
 }
 
 int HeldItem::remove()

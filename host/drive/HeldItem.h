@@ -32,6 +32,7 @@ public:
 
 private:
     HeldItem() = default;
+    int writeRecord(const DriveLayout& layout);
     void putBack();
     void forget();
 
