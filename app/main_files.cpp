@@ -1,0 +1,78 @@
+#include "host/drive/LocalCloudDocumentService.h"
+#include "host/system/GLibDispatch.h"
+#include "host/system/JournalLogSink.h"
+#include "host/system/LocalFileCoordinator.h"
+#include "host/system/MimeTypeRegistry.h"
+#include "host/system/PosixFileSystem.h"
+#include "items/FileUtils.h"
+#include "platform/NotificationCenter.h"
+
+#include <cstdio>
+#include <string>
+#include <string_view>
+#include <vector>
+
+/// The file operations of the program from a command line, for trying faults on them one call at a time
+/// (kills, full disks, other writers). Paths are below the drive's top level.
+
+namespace {
+
+using host::drive::LocalCloudDocumentService;
+using platform::Url;
+using tarrow::FileUtils;
+
+std::shared_ptr<LocalCloudDocumentService> installDrive(const std::shared_ptr<platform::Dispatch>& dispatch)
+{
+    platform::ServiceSet set;
+    set.dispatch = dispatch;
+    set.notificationCenter = std::make_shared<platform::NotificationCenter>();
+    set.typeRegistry = std::make_shared<host::system::MimeTypeRegistry>();
+    auto cloud = LocalCloudDocumentService::create(host::drive::DriveLayout::fromEnvironment(),
+        {set.dispatch, set.notificationCenter, set.typeRegistry, nullptr, nullptr}, {});
+    set.cloudDocumentService = cloud;
+    set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>(
+        host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination()});
+    set.fileSystem = std::make_shared<host::system::PosixFileSystem>(cloud->itemChanges());
+    platform::installServices(std::move(set));
+    return cloud;
+}
+
+int report(const std::optional<platform::Error>& error)
+{
+    if (error)
+        std::fprintf(stderr, "%s\n", error->debugDescription().c_str());
+    return error ? 1 : 0;
+}
+
+/// The exit status; 2 for what is no command.
+int run(std::string_view command, const std::vector<Url>& urls)
+{
+    if (command == "mkdir" && urls.size() == 1)
+        return report(FileUtils::mkdir(urls[0]));
+    if (command == "remove" && urls.size() == 1)
+        return report(FileUtils::remove(urls[0]));
+    if (command == "move" && urls.size() == 2)
+        return report(FileUtils::moveTo(urls[0], urls[1]));
+    if (command == "evict" && urls.size() == 1)
+        return FileUtils::evictDocument(urls[0]) ? 0 : 1;
+    return 2;
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    host::system::installSystemLog();
+    const std::vector<std::string> arguments(argv, argv + argc);
+    // The queues end last: the services may still hand them work while they end.
+    const std::shared_ptr<platform::Dispatch> dispatch = std::make_shared<host::system::GLibDispatch>();
+    const auto top = installDrive(dispatch)->layout().defaultContainer();
+    std::vector<Url> urls;
+    for (std::size_t i = 2; i < arguments.size(); ++i)
+        urls.push_back(Url::fileURL(top + '/' + arguments[i]));
+    const int status = arguments.size() > 1 ? run(arguments[1], urls) : 2;
+    if (status == 2)
+        std::fputs("usage: tarrow-files mkdir|remove|evict PATH | move FROM TO\n", stderr);
+    platform::installServices({});
+    return status;
+}
