@@ -3,6 +3,8 @@
 #include "host/drive/AccountRecord.h"
 #include "platform/Log.h"
 
+#include <utility>
+
 namespace host::drive {
 
 namespace {
@@ -76,9 +78,11 @@ void AccountMonitor::nameChanged(const std::string& name)
 
 void AccountMonitor::check()
 {
-    if (_checkIsWaiting)
+    // What waits may have read the file already: it is read once more, so that the last change is seen.
+    if (std::exchange(_checkIsWaiting, true)) {
+        _checkAgain = true;
         return;
-    _checkIsWaiting = true;
+    }
     _queue->async([weak = weak_from_this(), layout = _layout, main = _dispatch->mainQueue()] {
         main->async([weak, identity = currentIdentity(layout)] {
             if (const auto self = weak.lock())
@@ -90,6 +94,8 @@ void AccountMonitor::check()
 void AccountMonitor::identityRead(std::optional<std::string> identity)
 {
     _checkIsWaiting = false;
+    if (std::exchange(_checkAgain, false))
+        check();
     const bool changed = identity != _identity;
     _identity = std::move(identity);
     if (_fileChanged)

@@ -44,6 +44,7 @@ private:
     std::function<void()> _fileChanged;
     std::optional<std::string> _identity;
     bool _checkIsWaiting = false;
+    bool _checkAgain = false; ///< something changed while a check waited
 };
 
 } // namespace host::drive
