@@ -9,6 +9,7 @@
 #include <clocale>
 #include <cstdlib>
 #include <map>
+#include <ostream>
 
 using namespace platform;
 using host::system::GettextLocalization;
@@ -111,6 +112,10 @@ struct ByteCountRow {
     const char* text;
     double number;
 };
+void PrintTo(const ByteCountRow& row, std::ostream* out)
+{
+    *out << row.locale << ' ' << row.bytes;
+}
 
 class ByteCount : public testing::TestWithParam<ByteCountRow> { };
 

@@ -8,6 +8,8 @@
 
 #include <gtest/gtest.h>
 
+#include <ostream>
+
 namespace platform::ui {
 
 namespace {
@@ -51,6 +53,10 @@ struct EditCase {
     TextRange range;
     const char* replacement;
 };
+void PrintTo(const EditCase& row, std::ostream* out)
+{
+    *out << row.before << " to " << row.after;
+}
 
 class Edit : public testing::TestWithParam<EditCase> { };
 

@@ -8,6 +8,8 @@
 
 #include <gtest/gtest.h>
 
+#include <ostream>
+
 namespace platform {
 
 void PrintTo(const Size& size, std::ostream* out)
@@ -292,6 +294,10 @@ struct StackCase {
     StackDistribution distribution;
     Rect first, second;
 };
+void PrintTo(const StackCase& row, std::ostream* out)
+{
+    *out << row.name;
+}
 
 class Stack : public Layout, public testing::WithParamInterface<StackCase> { };
 
@@ -357,6 +363,10 @@ struct FormatCase {
     const char* format;
     std::size_t position;
 };
+void PrintTo(const FormatCase& row, std::ostream* out)
+{
+    *out << row.format;
+}
 
 class BadFormat : public testing::TestWithParam<FormatCase> { };
 

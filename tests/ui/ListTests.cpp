@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <numeric>
+#include <ostream>
 #include <random>
 
 namespace platform::ui {
@@ -163,6 +164,10 @@ struct DifferenceCase {
     Ids before, after;
     std::vector<ListSplice> splices;
 };
+void PrintTo(const DifferenceCase& row, std::ostream* out)
+{
+    *out << row.name;
+}
 
 class Difference : public testing::TestWithParam<DifferenceCase> { };
 
