@@ -114,8 +114,8 @@ void LayoutEngine::Impl::updateConstraints(View& view)
 
 void LayoutEngine::Impl::collect(const std::shared_ptr<View>& view)
 {
-    // The root owns this engine, but for one that is made for a fitting size alone: to hold the root from here
-    // would keep both for ever.
+    // The root owns this engine, but for one that is made for a fitting size alone: to hold the root from
+    // here would keep both for ever.
     const bool isOwner = view.get() == &root && !isFitting;
     tree.push_back(isOwner ? std::shared_ptr<View>(std::shared_ptr<void>(), &root) : view);
     for (const auto& subview : view->subviews()) {

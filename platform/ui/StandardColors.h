@@ -4,8 +4,9 @@
 
 namespace platform::ui {
 
-/// The platform's standard colours in light surroundings. A host shows these, a white background and black content
-/// in its theme's colours for the same purpose, so that they follow dark and high-contrast surroundings.
+/// The platform's standard colours in light surroundings. A host shows these, a white background and black
+/// content in its theme's colours for the same purpose, so that they follow dark and high-contrast
+/// surroundings.
 namespace StandardColors {
 
 inline constexpr Color red{

@@ -7,8 +7,8 @@
 
 namespace testing_support {
 
-/// An account whose token and quota answers the test chooses, over the documents of another service. Without such a
-/// service only the account may be asked for.
+/// An account whose token and quota answers the test chooses, over the documents of another service. Without
+/// such a service only the account may be asked for.
 class SimulatedCloud : public platform::CloudDocumentService, public platform::CloudAccount {
 public:
     explicit SimulatedCloud(std::shared_ptr<platform::CloudDocumentService> documents = nullptr)
