@@ -12,9 +12,18 @@ using platform::FileErrorCode;
 using platform::localized;
 using platform::ui::AlertAction;
 using platform::ui::AlertController;
-using platform::ui::ViewController;
 
 namespace {
+
+/// The codes that are made without any information about the failure.
+std::string describeCode(const Error& error)
+{
+    if (error.is(FileErrorCode::Unsupported))
+        return localized("This operation is not supported.");
+    if (error.is(FileErrorCode::Cancelled))
+        return localized("The item was kept because it was changed in the meantime.");
+    return localized("Mishap exception");
+}
 
 std::string describe(const Error& error)
 {
@@ -23,13 +32,25 @@ std::string describe(const Error& error)
         if (auto text = error.text(key); text && !text->empty())
             return *text;
     }
-    return localized("Mishap exception");
+    return describeCode(error);
+}
+
+std::string destinationName(const Error& error)
+{
+    const auto path = error.text(platform::errorKey::destinationFilePath);
+    return path && !path->empty() ? platform::Url::fileURL(*path).lastPathComponent() : std::string();
+}
+
+/// A name without its extension.
+std::string stemOf(const std::string& name, const std::string& extension)
+{
+    return extension.empty() ? name : name.substr(0, name.size() - extension.size() - 1);
 }
 
 } // namespace
 
 void UIUtils::showAlertMessageParentViewController(
-    const std::string& title, const std::string& message, const std::shared_ptr<ViewController>& parent)
+    const std::string& title, const std::string& message, const Screen& parent)
 {
     if (!parent)
         return;
@@ -38,12 +59,18 @@ void UIUtils::showAlertMessageParentViewController(
     parent->presentViewController(alert, true);
 }
 
-void UIUtils::showErrorParentViewController(const Error& error, const std::shared_ptr<ViewController>& parent)
+void UIUtils::showErrorParentViewController(const MaybeError& error, const Screen& parent)
 {
-    showAlertMessageParentViewController(describe(error), {}, parent);
+    showAlertMessageParentViewController(
+        error ? describe(*error) : localized("Mishap exception"), {}, parent);
 }
 
-std::string UIUtils::bestMessage(const std::optional<Error>& error)
+void UIUtils::showUnsupportedError(const Screen& parent)
+{
+    showErrorParentViewController(Error(FileErrorCode::Unsupported), parent);
+}
+
+std::string UIUtils::bestMessage(const MaybeError& error)
 {
     if (!error)
         return {};
@@ -57,14 +84,64 @@ std::string UIUtils::bestMessage(const std::optional<Error>& error)
     }
 }
 
+void UIUtils::showFriendlyMoveErrorParentViewController(const Error& error, const Screen& parent)
+{
+    showFriendlyMoveOrRenameErrorBasenameMovingToDirParentViewController(
+        error, destinationName(error), true, parent);
+}
+
+void UIUtils::showFriendlyRenameErrorBasenameParentViewController(
+    const Error& error, const std::string& name, const Screen& parent)
+{
+    showFriendlyMoveOrRenameErrorBasenameMovingToDirParentViewController(error, name, false, parent);
+}
+
+void UIUtils::showFriendlyMoveOrRenameErrorBasenameMovingToDirParentViewController(
+    const Error& error, const std::string& name, bool movingToDir, const Screen& parent)
+{
+    switch (static_cast<FileErrorCode>(error.code())) {
+    case FileErrorCode::ItemExists:
+        showItemExistsAlertMovingToDirParentViewController(name, movingToDir, parent);
+        break;
+    case FileErrorCode::InvalidName:
+        showInvalidItemNameAlertParentViewController(name, parent);
+        break;
+    default:
+        showErrorParentViewController(error, parent);
+    }
+}
+
+void UIUtils::showItemExistsAlertMovingToDirParentViewController(
+    const std::string& name, bool movingToDir, const Screen& parent)
+{
+    if (movingToDir) {
+        const auto title = localized("An item named “%@” already exists in the new location.", {name});
+        showAlertMessageParentViewController(title, {}, parent);
+        return;
+    }
+    const auto extension = platform::Url::fileURL("/").appendingPathComponent(name).pathExtension();
+    const auto stem = stemOf(name, extension);
+    const auto title = extension.empty()
+        ? localized("The name “%@” is already taken.", {stem})
+        : localized("The name “%1$@” with extension “.%2$@” is already taken.", {stem, extension});
+    showAlertMessageParentViewController(title, localized("Choose a different name."), parent);
+}
+
+void UIUtils::showInvalidItemNameAlertParentViewController(const std::string& name, const Screen& parent)
+{
+    const auto message = localized("The name “%@” can’t be used. Try using a name with fewer characters, or "
+                                   "with no punctuation marks.",
+        {name});
+    showAlertMessageParentViewController({}, message, parent);
+}
+
 bool UIUtils::tabulaMode()
 {
     const auto& screen = platform::ui::Screen::main();
     return screen && screen->idiom == platform::ui::UserInterfaceIdiom::Tablet;
 }
 
-void UIUtils::addChildViewControllerChildViewController(
-    const std::shared_ptr<ViewController>& parent, const std::shared_ptr<ViewController>& child)
+void UIUtils::addChildViewControllerChildViewController(const Screen& parent, const Screen& child)
 {
     parent->addChildViewController(child);
     parent->view()->addSubview(child->view());

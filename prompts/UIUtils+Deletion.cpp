@@ -1,0 +1,90 @@
+#include "items/DRItem.h"
+#include "platform/Localization.h"
+#include "platform/ui/AlertController.h"
+#include "platform/ui/BarButtonItem.h"
+#include "platform/ui/View.h"
+#include "prompts/UIUtils.h"
+
+namespace tarrow {
+
+using platform::localized;
+using platform::ui::AlertAction;
+using platform::ui::AlertActionStyle;
+using platform::ui::AlertController;
+
+namespace {
+
+using Pressed = std::shared_ptr<AlertAction>;
+
+constexpr Operation op{"+[UIUtils showDeleteWarningAlert:hasContainer:viewController:usingView:usingButton:"
+                       "completion:]"};
+
+/// A line across the view's middle, from whose ends the popover's arrow may come.
+platform::ui::PopoverAnchor anchorOf(const std::shared_ptr<platform::ui::View>& view,
+    const std::shared_ptr<platform::ui::BarButtonItem>& button)
+{
+    if (!view)
+        return std::weak_ptr(button);
+    const auto bounds = view->bounds();
+    return platform::ui::ViewAnchor{
+        view, {bounds.x, bounds.midY(), bounds.width, 0}, platform::ui::ArrowDirections::LeftOrRight};
+}
+
+std::shared_ptr<AlertAction> deleteAction(const UIUtils::DeleteCompletion& completion)
+{
+    return std::make_shared<AlertAction>(localized("Delete from Tarrow Drive"), AlertActionStyle::Destructive,
+        [completion](const Pressed& action) {
+            op.debug("Delete action");
+            completion(action, false);
+        });
+}
+
+std::shared_ptr<AlertAction> cancelAction(const UIUtils::DeleteCompletion& completion)
+{
+    return std::make_shared<AlertAction>(
+        localized("Cancel"), AlertActionStyle::Cancel, [completion](const Pressed& action) {
+            op.info("Delete: Cancel pressed");
+            completion(action, true);
+        });
+}
+
+} // namespace
+
+void UIUtils::showDeleteWarningAlertHasContainerViewControllerUsingViewUsingButtonCompletion(
+    const std::vector<Url>& items, bool /*hasContainer*/, const Screen& parent,
+    const std::shared_ptr<platform::ui::View>& view,
+    const std::shared_ptr<platform::ui::BarButtonItem>& button, DeleteCompletion completion)
+{
+    const auto message = items.empty() ? std::nullopt : messageForDeletePrompt(items);
+    if (!message || !parent) {
+        completion(nullptr, true);
+        return;
+    }
+    const auto sheet = std::make_shared<AlertController>("", *message, platform::ui::AlertStyle::ActionSheet);
+    sheet->addAction(deleteAction(completion));
+    sheet->addAction(cancelAction(completion));
+    sheet->setPopoverAnchor(anchorOf(view, button));
+    parent->presentViewController(sheet, true);
+}
+
+std::optional<std::string> UIUtils::messageForDeletePrompt(const std::vector<Url>& items)
+{
+    if (items.size() != 1) {
+        const auto count = static_cast<std::int64_t>(items.size());
+        return localized("%@ will be permanently deleted from Tarrow Drive on all your devices. This action "
+                         "cannot be undone.",
+            {platform::localizedPlural(".DICT.ITEMS.%d", {count})});
+    }
+    const auto item = DRItem::initWithURL(items.front());
+    if (!item || item->localizedName().empty())
+        return std::nullopt;
+    if (item->isContainer())
+        return localized("The %@ app library, and all its documents, will be permanently deleted from Tarrow "
+                         "Drive on all your devices. This action cannot be undone.",
+            {item->localizedName()});
+    return localized("\"%@\" will be permanently deleted from Tarrow Drive on all your devices. This action "
+                     "cannot be undone.",
+        {item->localizedName()});
+}
+
+} // namespace tarrow

@@ -1,0 +1,80 @@
+#include "items/FileUtils.h"
+#include "items/UrlResolution.h"
+#include "platform/Localization.h"
+#include "platform/ui/TextField.h"
+#include "prompts/UIUtils.h"
+
+#include <algorithm>
+
+namespace tarrow {
+
+using platform::ui::TextField;
+using platform::ui::TextRange;
+
+namespace {
+
+std::size_t characterCount(std::string_view text)
+{
+    return static_cast<std::size_t>(std::ranges::count_if(
+        text, [](char byte) { return (static_cast<unsigned char>(byte) & 0xC0U) != 0x80U; }));
+}
+
+/// A reference whose document cannot be told is renamed no more than one whose document is gone.
+Error lostReference(const Url& reference)
+{
+    const auto description = platform::localized("“%@” is no longer there.", {reference.lastPathComponent()});
+    return Error(FileErrorCode::NoSuchFile,
+        {{std::string(platform::errorKey::localizedDescription), description},
+            {std::string(platform::errorKey::filePath), reference.path()}});
+}
+
+} // namespace
+
+UIUtils::MaybeError UIUtils::renameItemAtURLToName(const Url& url, const std::string& name)
+{
+    static constexpr Operation op{"+[UIUtils renameItemAtURL:toName:]"};
+    if (name.empty()) {
+        op.debug("Rename: empty, reverting");
+        return Error(FileErrorCode::InvalidName);
+    }
+    if (!FileUtils::isValidFilename(name)) {
+        op.debug("Name is invalid: %@", name);
+        return Error(FileErrorCode::InvalidName);
+    }
+    op.debug("Name is valid: %@", name);
+    const auto resolved = trw_URLByResolvingBookmark(url);
+    if (services().cloudDocumentService().promisedItems().isExternalDocumentReference(url))
+        op.debug("Renaming bookmark %@ (%@)", url, resolved);
+    if (!resolved)
+        return lostReference(url);
+    const auto destination = computeNewURLNewBasename(*resolved, name);
+    if (*resolved == destination) {
+        op.debug("Rename: Old and new URLs are the same: %@ - %@", *resolved, destination);
+        return std::nullopt;
+    }
+    return FileUtils::moveTo(*resolved, destination);
+}
+
+Url UIUtils::computeNewURLNewBasename(const Url& url, const std::string& name)
+{
+    const auto folder = url.deletingLastPathComponent();
+    auto renamed = folder.appendingPathComponent(name);
+    const auto extension = url.pathExtension();
+    if (extension.empty() || services().formatters().equalIgnoringCase(extension, renamed.pathExtension()))
+        return renamed;
+    return folder.appendingPathComponent(name + "." + extension);
+}
+
+void UIUtils::setCursorInTextFieldToBeforeExtension(TextField& field)
+{
+    const auto dot = field.text().rfind('.');
+    if (dot != std::string::npos)
+        selectTextInTextFieldRange(field, {characterCount(std::string_view(field.text()).substr(0, dot)), 0});
+}
+
+void UIUtils::selectTextInTextFieldRange(TextField& field, TextRange range)
+{
+    field.setSelectedRange(range);
+}
+
+} // namespace tarrow
