@@ -3,6 +3,7 @@
 #include "host/drive/AccountRecord.h"
 #include "platform/Log.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace host::drive {
@@ -38,11 +39,11 @@ AccountMonitor::AccountMonitor(const DriveLayout& layout, const DriveDependencie
 bool AccountMonitor::watch()
 {
     // The folder is watched rather than the file, so that its creation and its replacement are seen.
-    _watch = FolderWatch::start(_layout.home(), [weak = weak_from_this()](const std::string& name) {
+    _watcher = std::make_unique<host::system::FolderWatcher>([weak = weak_from_this()](const auto& names) {
         if (const auto self = weak.lock())
-            self->nameChanged(name);
+            std::ranges::for_each(names, [&](const auto& name) { self->nameChanged(name); });
     });
-    return _watch != nullptr;
+    return _watcher->watch(_layout.home());
 }
 
 void AccountMonitor::begin()

@@ -2,7 +2,7 @@
 
 #include "host/drive/DriveDependencies.h"
 #include "host/drive/DriveLayout.h"
-#include "host/drive/FolderWatch.h"
+#include "host/system/FolderWatcher.h"
 #include "platform/Dispatch.h"
 #include "platform/NotificationCenter.h"
 
@@ -40,7 +40,7 @@ private:
     std::shared_ptr<platform::Dispatch> _dispatch;
     std::shared_ptr<platform::NotificationCenter> _notifications;
     std::shared_ptr<platform::Queue> _queue;
-    std::unique_ptr<FolderWatch> _watch;
+    std::unique_ptr<host::system::FolderWatcher> _watcher;
     std::function<void()> _fileChanged;
     std::optional<std::string> _identity;
     bool _checkIsWaiting = false;

@@ -4,6 +4,8 @@
 #include "host/drive/SmallFile.h"
 #include "platform/Log.h"
 
+#include <algorithm>
+
 namespace host::drive {
 
 namespace {
@@ -100,11 +102,11 @@ void LocalKeyValueStore::begin()
 bool LocalKeyValueStore::watch()
 {
     // The folder is watched rather than the file, so that its creation and its replacement are seen.
-    _watch = FolderWatch::start(_layout.home(), [weak = weak_from_this()](const std::string& name) {
+    _watcher = std::make_unique<host::system::FolderWatcher>([weak = weak_from_this()](const auto& names) {
         if (const auto self = weak.lock())
-            self->nameChanged(name);
+            std::ranges::for_each(names, [&](const auto& name) { self->nameChanged(name); });
     });
-    return _watch != nullptr;
+    return _watcher->watch(_layout.home());
 }
 
 // The folder went away, as when its volume was taken off; it may come back.

@@ -2,7 +2,7 @@
 
 #include "host/drive/DriveDependencies.h"
 #include "host/drive/DriveLayout.h"
-#include "host/drive/FolderWatch.h"
+#include "host/system/FolderWatcher.h"
 #include "platform/Dispatch.h"
 #include "platform/KeyValueStore.h"
 #include "platform/NotificationCenter.h"
@@ -42,7 +42,7 @@ private:
     std::shared_ptr<platform::Dispatch> _dispatch;
     std::shared_ptr<platform::NotificationCenter> _notifications;
     std::shared_ptr<platform::Queue> _queue;
-    std::unique_ptr<FolderWatch> _watch;
+    std::unique_ptr<host::system::FolderWatcher> _watcher;
     const std::shared_ptr<std::atomic_bool> _readingWaits = std::make_shared<std::atomic_bool>(false);
     mutable std::mutex _mutex;
     mutable std::optional<platform::PropertyDictionary> _values; ///< nothing before the first reading

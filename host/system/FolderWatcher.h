@@ -1,25 +1,32 @@
 #pragma once
 
 #include "host/system/FileDescriptor.h"
+#include "host/system/Inotify.h"
 
 #include <functional>
 #include <memory>
+#include <string>
+#include <vector>
 
 namespace host::system {
 
-/// Tells that something in a folder changed: names came or went, contents were written, attributes set, or
-/// the folder itself went away. Where the system has no watches left, it tells nothing.
+/// Tells what changes directly in one folder: names that came or went, were written, or have other
+/// attributes, or that the folder itself went away.
 class FolderWatcher {
 public:
-    /// Make it on the main thread; `changed` is called there (in GLib's default main context), once for all
-    /// changes that one turn of the loop brings.
-    explicit FolderWatcher(std::function<void()> changed);
-    ~FolderWatcher();
+    /// Called on the main thread (in GLib's default main context), once for all changes that one turn of the
+    /// loop brings: with the names, perhaps several times each. An empty name: changes were lost, or the
+    /// folder itself went away. It may end the watcher.
+    using Handler = std::function<void(const std::vector<std::string>& names)>;
+
+    explicit FolderWatcher(Handler changed);
     FolderWatcher(const FolderWatcher&) = delete;
     FolderWatcher& operator=(const FolderWatcher&) = delete;
 
-    /// Watches the very folder that is open here instead of what was watched before. Any thread.
-    void watch(const FileDescriptor& folder);
+    /// Watches a folder instead of what was watched before; by descriptor it is the very folder that is open.
+    /// Any thread. Answers whether it is watched: it may be missing, or the system may have no watches left.
+    bool watch(const std::string& folder);
+    bool watch(const FileDescriptor& folder);
 
 private:
     struct State;

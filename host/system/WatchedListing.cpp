@@ -69,7 +69,7 @@ void WatchedListing::startReading()
     _mustReadAgain = false;
     _readingBegan = _dispatch->now();
     if (!_watcher)
-        _watcher = std::make_shared<FolderWatcher>([weak = weak_from_this()] {
+        _watcher = std::make_shared<FolderWatcher>([weak = weak_from_this()](const auto&) {
             if (const auto self = weak.lock())
                 self->folderChanged();
         });

@@ -1,0 +1,48 @@
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace host::system {
+
+/// The kernel's notices of what happens in folders: one queue of the kernel's, read in the main loop (GLib's
+/// default main context). Any thread, but for what `arrived` says.
+class Inotify {
+public:
+    /// Whether a file that is being written tells so at once, or when it is closed.
+    enum class Writing { WhenClosed, AtOnce };
+
+    struct Event {
+        int watch = -1;
+        std::uint32_t mask = 0; ///< as the kernel has it
+        std::uint32_t cookie = 0; ///< the same for both halves of a move; else 0
+        std::string name; ///< empty: the watched folder itself
+
+        /// Whether names may have come and gone without notice: too many events, or the folder went away.
+        bool isLoss() const;
+    };
+
+    /// `arrived` is called on the main thread when events wait to be taken; it may end this object.
+    Inotify(Writing writing, std::function<void()> arrived);
+    ~Inotify();
+    Inotify(const Inotify&) = delete;
+    Inotify& operator=(const Inotify&) = delete;
+
+    /// Watches the names in a folder: made, removed, moved, written, with other attributes. Answers the
+    /// watch, the same one for the same folder, or -1 and errno: ENOSPC or EMFILE when the system has none
+    /// left.
+    int watch(const std::string& folder);
+    void unwatch(int watch);
+
+    /// Everything that happened until this call and was not taken yet, in order.
+    std::vector<Event> take();
+
+private:
+    struct State;
+    std::shared_ptr<State> _state;
+};
+
+} // namespace host::system
