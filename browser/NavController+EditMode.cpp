@@ -17,14 +17,22 @@ using platform::ByteCountStyle;
 using platform::ByteCountUnit;
 using platform::Operation;
 using platform::services;
+using platform::components::DocumentListAction;
 using platform::components::DocumentListController;
+
+namespace {
+
+constexpr auto offeredActions = actionBit(DocumentListAction::Delete) | actionBit(DocumentListAction::Rename)
+    | actionBit(DocumentListAction::PressurePop);
+
+} // namespace
 
 void NavController::initNewListController(const List& list)
 {
     static constexpr Operation op{"-[NavController initNewListController:]"};
     _viewTitle = list->title();
     logNewList(list);
-    list->setAvailableActions(actionBit(platform::components::DocumentListAction::PressurePop));
+    list->setAvailableActions(offeredActions);
     configureNavBar(list);
     if (list->title().empty())
         op.warning("Warning: newList title not set");

@@ -20,7 +20,6 @@
 
 namespace tarrow {
 
-using platform::components::DocumentListAction;
 using platform::components::DocumentListController;
 
 namespace {
@@ -292,24 +291,6 @@ NavController::Screen NavController::documentListControllerViewControllerForPrev
         return PeekFolderViewController::initWithURL(url);
     op.debug("URL is not a regular file, package, or folder");
     return nullptr;
-}
-
-void NavController::documentListControllerPerformActionURLOriginatingViewCompletion(const List&, int action,
-    const Url& url, const std::shared_ptr<platform::ui::View>&, const Completion& completion)
-{
-    static constexpr Operation op{
-        "-[NavController documentListController:performAction:URL:originatingView:completion:]"};
-    if (action != static_cast<int>(DocumentListAction::PressurePop)) {
-        op.error("performAction:%{public}@ -- unexpected value", action);
-        if (completion)
-            completion();
-        return;
-    }
-    op.userAction("DLC Action Firmtap Pop");
-    op.info("Preview action: %@", url);
-    if (completion)
-        completion();
-    knopPopToURL(url);
 }
 
 void NavController::knopPopToURL(const Url& url)

@@ -20,10 +20,14 @@ class PropertyValue;
 namespace platform::components {
 class UpgradeFlow;
 }
+namespace platform::ui {
+class BarButtonItem;
+}
 
 namespace tarrow {
 
 class DRItem;
+class FilenamePrompt;
 class PreviewItemManager;
 
 /// The browser: a stack of the drive's folder lists with a preview on top of them, or the screen that says
@@ -52,6 +56,10 @@ public:
     const std::shared_ptr<QuotaFetcher>& quotaFetcher() const { return _quotaFetcher; }
     /// The manager of the current preview; null while a folder list is on top.
     const std::shared_ptr<PreviewItemManager>& itemManager() const { return _itemManager; }
+    /// The name prompt that was shown last.
+    const std::shared_ptr<FilenamePrompt>& folderPromptAlert() const { return _folderPromptAlert; }
+    /// What is called when the last list action that asks before a deletion has ended.
+    const Completion& performActionCompletionBlock() const { return _performActionCompletionBlock; }
     /// The storage upgrade that was started last.
     const std::shared_ptr<platform::components::UpgradeFlow>& upgradeFlowMgr() const
     {
@@ -125,8 +133,32 @@ public:
     void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,
         const platform::Url& url, const std::shared_ptr<platform::ui::View>& originatingView,
         const Completion& completion) override;
+    void documentListControllerPerformActionURL(
+        const List& list, int action, const platform::Url& url) override;
     std::vector<platform::Color> documentListControllerColorsForTagNames(
         const List& list, const std::vector<std::string>& names) override;
+
+    // Item actions. The file operations block until they are done.
+    /// Asks for the name of a new folder in the folder of the list on top.
+    void promtForNewFolderAndCreate(const std::shared_ptr<platform::ui::BarButtonItem>& sender);
+    /// Asks for the name of a new folder, and moves items into it once it is made.
+    void showNewFolderPromptDuringMoveItemsToMove(
+        const std::optional<platform::Url>& folder, const std::vector<platform::Url>& items);
+    /// Asks for an item's new name.
+    void showRenamePrompt(const platform::Url& url);
+    /// Moves items into a folder, one after the other; answers the errors of those that stayed.
+    std::vector<platform::Error> moveItemsToDirectoryToDirectory(
+        const std::vector<platform::Url>& items, const platform::Url& directory);
+    /// The same, and tells the user what stayed.
+    void moveItemsToDirectoryAndShowErrorsToDirectory(
+        const std::vector<platform::Url>& items, const platform::Url& directory);
+    /// Asks before the selected items of the list on top are deleted.
+    void showWarningAndDeleteDocument(const std::shared_ptr<platform::ui::BarButtonItem>& sender);
+    /// Asks before items (documents and folders, or app libraries) are deleted, at a view or at the toolbar's
+    /// button. The finisher (may be empty) is called once, after the answer or a refusal.
+    void showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(
+        const std::vector<platform::Url>& urls, const std::shared_ptr<platform::ui::View>& view,
+        const List& list, const Completion& finished);
 
 private:
     std::shared_ptr<NavController> self();
@@ -142,6 +174,10 @@ private:
     void showVanishedItem(const platform::Url& url);
     void openFolder(const platform::Url& url, const platform::Operation& op);
     void openDocument(const std::shared_ptr<DRItem>& item, const platform::Operation& op);
+    void performDelete(const platform::Url& url, const std::shared_ptr<platform::ui::View>& view,
+        const Completion& completion);
+    void performInfo(const platform::Url& url);
+    void deleteConfirmed(const std::vector<platform::Url>& urls, const Completion& finished);
 
     bool _pickerIsAlive = false;
     std::weak_ptr<platform::ui::ViewController> _splitViewController;
@@ -149,6 +185,8 @@ private:
     std::optional<platform::Date> _lastQuotaFetch;
     std::shared_ptr<QuotaFetcher> _quotaFetcher;
     std::shared_ptr<PreviewItemManager> _itemManager;
+    std::shared_ptr<FilenamePrompt> _folderPromptAlert;
+    Completion _performActionCompletionBlock;
     std::shared_ptr<platform::components::UpgradeFlow> _upgradeFlowMgr;
     std::shared_ptr<const platform::StorageOffer> _upgradeOffer;
     std::uint64_t _quotaBytes = 0;

@@ -69,6 +69,10 @@ public:
     virtual bool canMoveWithoutDownloading(
         const DocumentContainer& source, const DocumentContainer& destination) const = 0;
 
+    /// Deletes a container with all its documents, on this device and on the server. The default container is
+    /// never deleted (FileErrorCode::Unsupported). Synchronous; waits for nobody who uses the documents.
+    virtual std::optional<Error> deleteContents(const DocumentContainer& container) = 0;
+
     /// All containers that the service knows, the default container first, then by localized name.
     virtual std::vector<std::shared_ptr<const DocumentContainer>> allContainers() const = 0;
 };

@@ -1,5 +1,6 @@
 #include "host/drive/LocalContainers.h"
 
+#include "host/drive/LocalItemChanges.h"
 #include "host/drive/SmallFile.h"
 #include "host/system/DirectoryReader.h"
 #include "platform/Log.h"
@@ -119,6 +120,14 @@ bool LocalContainers::canMoveWithoutDownloading(const DocumentContainer&, const 
 {
     // All containers of the local store share one file system and one cloud: promises move as they are.
     return true;
+}
+
+std::optional<platform::Error> LocalContainers::deleteContents(const DocumentContainer& container)
+{
+    if (container.identifier == DriveLayout::defaultContainerIdentifier)
+        return platform::Error(platform::FileErrorCode::Unsupported);
+    // Its description stays: an app that makes documents again finds its library as it was.
+    return LocalItemChanges(_layout).removeItem(_layout.container(container.identifier), std::nullopt);
 }
 
 std::vector<ContainerPointer> LocalContainers::allContainers() const

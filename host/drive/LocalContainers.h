@@ -29,6 +29,7 @@ public:
     std::optional<std::string> pathRelativeToSyncedRoot(const platform::Url& url) const override;
     bool canMoveWithoutDownloading(const platform::DocumentContainer& source,
         const platform::DocumentContainer& destination) const override;
+    std::optional<platform::Error> deleteContents(const platform::DocumentContainer& container) override;
     std::vector<std::shared_ptr<const platform::DocumentContainer>> allContainers() const override;
 
 private:

@@ -40,6 +40,7 @@ BrowserFixture::BrowserFixture()
     const auto types = std::make_shared<host::system::MimeTypeRegistry>();
     platform::ServiceSet set;
     set.appRegistry = apps;
+    set.characterData = borrowed(_driveServices.characterData());
     set.cloudDocumentService = cloud;
     set.dispatch = drive.dispatch;
     set.fileCoordinator = borrowed(_driveServices.fileCoordinator());

@@ -1,0 +1,66 @@
+#include "browser/ItemDeletion.h"
+
+#include "items/FileUtils.h"
+
+namespace tarrow {
+
+namespace {
+
+constexpr Operation op{
+    "-[NavController showWarningAndDeleteURLs:usingView:withDocumentListController:finishedCompletion:]"};
+
+platform::DocumentContainers& containers()
+{
+    return services().cloudDocumentService().containers();
+}
+
+void failed(DeletionOutcome& outcome, std::optional<Error> error)
+{
+    ++outcome.failures;
+    if (error)
+        outcome.lastError = std::move(error);
+}
+
+void deleteItem(const Url& url, DeletionOutcome& outcome)
+{
+    op.info("Deleting item %@", url);
+    if (auto error = FileUtils::remove(url)) {
+        op.warning("Failed to delete URL %@: %{public}@", url, *error);
+        failed(outcome, std::move(error));
+    }
+}
+
+void deleteLibrary(const Url& url, DeletionOutcome& outcome)
+{
+    const auto found = containers().containerForItem(url);
+    const auto container = found ? *found : nullptr;
+    if (!container || found.error || container->identifier.empty()) {
+        op.warning("No container for URL %@: %{public}@", url, found.error);
+        failed(outcome, std::nullopt);
+    } else if (container->identifier == containers().defaultContainerIdentifier()) {
+        op.error("NOT Deleting root container %{public}@", container->identifier);
+        failed(outcome, std::nullopt);
+    } else {
+        op.info("Deleting container %{public}@", container->identifier);
+        if (auto error = containers().deleteContents(*container)) {
+            op.warning("Failed to delete container %{public}@: %{public}@", container->identifier, *error);
+            failed(outcome, std::move(error));
+        }
+    }
+}
+
+} // namespace
+
+DeletionOutcome deleteItems(const std::vector<Url>& urls)
+{
+    DeletionOutcome outcome;
+    for (const auto& url : urls) {
+        if (containers().isContainerTopFolder(url))
+            deleteLibrary(url, outcome);
+        else
+            deleteItem(url, outcome);
+    }
+    return outcome;
+}
+
+} // namespace tarrow

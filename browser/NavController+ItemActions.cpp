@@ -1,0 +1,252 @@
+// What is done to items: new folders, moves, new names and deletions, and who asks for them.
+
+#include "browser/ItemDeletion.h"
+#include "browser/NavController.h"
+#include "items/DRItem.h"
+#include "items/FileUtils.h"
+#include "items/MenuEnableChecks.h"
+#include "items/UrlResolution.h"
+#include "platform/Localization.h"
+#include "platform/Log.h"
+#include "platform/components/DocumentListController.h"
+#include "platform/ui/AlertController.h"
+#include "platform/ui/View.h"
+#include "preview/PreviewMode.h"
+#include "prompts/NewFolderPrompt.h"
+#include "prompts/RenamePrompt.h"
+#include "prompts/UIUtils.h"
+
+namespace tarrow {
+
+using platform::localized;
+using platform::localizedPlural;
+using platform::components::DocumentListAction;
+
+namespace {
+
+std::int64_t count(const auto& items)
+{
+    return static_cast<std::int64_t>(items.size());
+}
+
+void call(const NavController::Completion& completion)
+{
+    if (completion)
+        completion();
+}
+
+/// Makes a folder that is not there yet.
+std::optional<Error> makeFolder(const Url& folder, const Operation& op)
+{
+    if (FileUtils::exists(folder)) {
+        op.info("Item exists at path: %@", folder);
+        return Error(FileErrorCode::ItemExists);
+    }
+    return FileUtils::mkdir(folder);
+}
+
+/// What is said inside the prompt about items that could not follow into the new folder.
+std::string messageAbout(const std::vector<Error>& errors)
+{
+    return errors.size() == 1 ? UIUtils::bestMessage(errors.front())
+                              : localizedPlural(".DICT.CANNOT_MOVE_ITEMS.%d", {count(errors)});
+}
+
+} // namespace
+
+void NavController::documentListControllerPerformActionURL(const List& list, int action, const Url& url)
+{
+    documentListControllerPerformActionURLOriginatingViewCompletion(list, action, url, view(), [] {});
+}
+
+void NavController::documentListControllerPerformActionURLOriginatingViewCompletion(const List&, int action,
+    const Url& url, const std::shared_ptr<platform::ui::View>& originatingView, const Completion& completion)
+{
+    static constexpr Operation op{
+        "-[NavController documentListController:performAction:URL:originatingView:completion:]"};
+    switch (static_cast<DocumentListAction>(action)) {
+    case DocumentListAction::Delete:
+        op.userAction("DLC Action Delete");
+        performDelete(url, originatingView, completion);
+        return;
+    case DocumentListAction::More:
+        op.error("performAction:%{public}@ -- More is deprecated, unexpected value", action);
+        return;
+    case DocumentListAction::Info:
+        op.userAction("DLC Action Info");
+        performInfo(url);
+        break;
+    case DocumentListAction::Rename:
+        op.userAction("DLC Action Rename");
+        op.info("Rename action: %@", url);
+        showRenamePrompt(url);
+        break;
+    case DocumentListAction::PressurePop:
+        op.userAction("DLC Action Firmtap Pop");
+        op.info("Preview action: %@", url);
+        call(completion);
+        knopPopToURL(url);
+        return;
+    default:
+        op.error("performAction:%{public}@ -- unexpected value", action);
+    }
+    call(completion);
+}
+
+void NavController::performDelete(
+    const Url& url, const std::shared_ptr<platform::ui::View>& originatingView, const Completion& completion)
+{
+    _performActionCompletionBlock = completion;
+    showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(
+        {url}, originatingView, nullptr, [completion] { call(completion); });
+}
+
+void NavController::performInfo(const Url& url)
+{
+    static constexpr Operation op{
+        "-[NavController documentListController:performAction:URL:originatingView:completion:]"};
+    op.info("Info action: %@", url);
+    const auto item = DRItem::initWithURL(url);
+    op.info("Info action item: %@", item ? item->description() : "(null)");
+    showPreviewPreviewMode(item, PreviewModeDetails);
+}
+
+void NavController::promtForNewFolderAndCreate(const std::shared_ptr<platform::ui::BarButtonItem>&)
+{
+    static constexpr Operation op{"-[NavController promtForNewFolderAndCreate:]"};
+    op.userAction("Pressed NewFolder");
+    op.info("Pressed NewFolder");
+    if (const auto list = getTopDocumentListController())
+        showNewFolderPromptDuringMoveItemsToMove(list->presentedURL(), {});
+}
+
+void NavController::showNewFolderPromptDuringMoveItemsToMove(
+    const std::optional<Url>& folder, const std::vector<Url>& items)
+{
+    static constexpr Operation op{"-[NavController showNewFolderPromptDuringMove:itemsToMove:]"};
+    op.userAction("Show New Folder Prompt (nav, during move)");
+    if (!folder) {
+        op.warning("dlc.presentedURL is nil");
+        return;
+    }
+    const auto title =
+        items.empty() ? localized("New Folder") : localizedPlural(".DICT.MOVE_ITEMS.%d", {count(items)});
+    const auto confirmed = [weak = std::weak_ptr(self()), folder = *folder, items](
+                               const std::string& name, bool& accepted) -> std::string {
+        if (name.empty())
+            return {};
+        op.userAction("New Folder name entry Confirmed");
+        op.info("New folder entered: %@", name);
+        const auto made = folder.appendingPathComponent(name, platform::PathKind::Directory);
+        if (const auto error = makeFolder(made, op))
+            return UIUtils::bestMessage(error);
+        const auto browser = weak.lock();
+        const auto errors = browser && !items.empty() ? browser->moveItemsToDirectoryToDirectory(items, made)
+                                                      : std::vector<Error>();
+        accepted = errors.empty();
+        return accepted ? std::string() : messageAbout(errors);
+    };
+    _folderPromptAlert = NewFolderPrompt::newWithTitleDoneButtonTextCompletion(
+        title, items.empty() ? localized("Create") : localized("Move"), confirmed);
+    presentViewController(_folderPromptAlert->alert(), true);
+}
+
+std::vector<Error> NavController::moveItemsToDirectoryToDirectory(
+    const std::vector<Url>& items, const Url& directory)
+{
+    static constexpr Operation op{"-[NavController moveItemsToDirectory:toDirectory:]"};
+    op.debug("MoveTarget = %@", directory);
+    op.debug("ItemsToMove = %@", items);
+    std::vector<Error> errors;
+    for (const auto& item : items) {
+        if (auto error = FileUtils::moveTo(item, directory.appendingPathComponent(item.lastPathComponent())))
+            errors.push_back(std::move(*error));
+    }
+    return errors;
+}
+
+void NavController::moveItemsToDirectoryAndShowErrorsToDirectory(
+    const std::vector<Url>& items, const Url& directory)
+{
+    const auto errors = moveItemsToDirectoryToDirectory(items, directory);
+    if (errors.size() == 1)
+        UIUtils::showFriendlyMoveErrorParentViewController(errors.front(), topViewController());
+    else if (!errors.empty())
+        UIUtils::showAlertMessageParentViewController(
+            localizedPlural(".DICT.CANNOT_MOVE_ITEMS.%d", {count(errors)}), {}, topViewController());
+}
+
+void NavController::showRenamePrompt(const Url& url)
+{
+    static constexpr Operation op{"-[NavController showRenamePrompt:]"};
+    const auto item = DRItem::initWithURL(url);
+    if (!item)
+        return;
+    if (trw_isDesktopOrDocumentsFolder(url)) {
+        op.warning("Not renaming special folder: %@", url);
+        UIUtils::showUnsupportedError(visibleViewController());
+        return;
+    }
+    _folderPromptAlert = RenamePrompt::newWithFilenameCompletion(
+        item->localizedName(), [url](const std::string& name, bool& accepted) -> std::string {
+            if (name.empty())
+                return {};
+            op.userAction("Rename entry confirmed (nav)");
+            const auto error = UIUtils::renameItemAtURLToName(url, name);
+            accepted = !error;
+            return UIUtils::bestMessage(error);
+        });
+    visibleViewController()->presentViewController(_folderPromptAlert->alert(), true);
+}
+
+void NavController::showWarningAndDeleteDocument(const std::shared_ptr<platform::ui::BarButtonItem>&)
+{
+    static constexpr Operation op{"-[NavController showWarningAndDeleteDocument:]"};
+    const auto list = getTopDocumentListController();
+    if (!list)
+        return;
+    const auto items = list->selectedItems();
+    op.userAction("Pressed Delete (nav)");
+    op.info("Pressed Delete after selecting %{public}@ items: %@", items.size(), items);
+    showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(items, nullptr, list, {});
+}
+
+void NavController::showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(
+    const std::vector<Url>& urls, const std::shared_ptr<platform::ui::View>& view, const List&,
+    const Completion& finished)
+{
+    static constexpr Operation op{
+        "-[NavController showWarningAndDeleteURLs:usingView:withDocumentListController:finishedCompletion:]"};
+    const auto libraries = MenuEnableChecks::numContainersInURLArray(urls);
+    if (libraries != 0 && libraries != urls.size()) {
+        op.error("Not Deleting: mix of containers and items: %@", urls);
+        call(finished);
+        return;
+    }
+    if (MenuEnableChecks::isDesktopOrDocumentsInURLArray(urls)) {
+        op.warning("Not deleting special folder: %@", urls);
+        call(finished);
+        UIUtils::showUnsupportedError(visibleViewController());
+        return;
+    }
+    UIUtils::showDeleteWarningAlertHasContainerViewControllerUsingViewUsingButtonCompletion(urls,
+        libraries != 0, visibleViewController(), view, nullptr,
+        [browser = self(), urls, finished](const auto&, bool cancelled) {
+            op.userAction(cancelled ? "Delete was Cancelled (nav)" : "Delete was Confirmed (nav)");
+            browser->deleteConfirmed(cancelled ? std::vector<Url>() : urls, finished);
+        });
+}
+
+void NavController::deleteConfirmed(const std::vector<Url>& urls, const Completion& finished)
+{
+    const auto outcome = deleteItems(urls);
+    call(finished);
+    if (outcome.failures == 1)
+        UIUtils::showErrorParentViewController(outcome.lastError, topViewController());
+    else if (outcome.failures > 1)
+        UIUtils::showAlertMessageParentViewController(
+            localizedPlural(".DICT.CANNOT_DELETE_ITEMS.%d", {static_cast<std::int64_t>(outcome.failures)}),
+            {}, topViewController());
+}
+
+} // namespace tarrow

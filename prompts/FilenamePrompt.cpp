@@ -1,0 +1,186 @@
+#include "prompts/FilenamePrompt.h"
+
+#include "items/FileUtils.h"
+#include "platform/Localization.h"
+#include "platform/ui/AlertController.h"
+#include "platform/ui/LayoutConstraint.h"
+#include "platform/ui/TextField.h"
+#include "prompts/SimpleTextViewController.h"
+#include "prompts/UIUtils.h"
+
+#include <algorithm>
+
+namespace tarrow {
+
+using platform::localized;
+using platform::ui::AlertAction;
+using platform::ui::AlertActionStyle;
+using platform::ui::AlertController;
+using platform::ui::TextField;
+
+namespace {
+
+constexpr double fieldHeightToLineHeight = 1.2;
+
+/// The characters with Unicode's property White_Space.
+constexpr std::string_view whiteSpace[] = {"\t", "\n", "\v", "\f", "\r", " ", "\u0085", "\u00a0", "\u1680",
+    "\u2000", "\u2001", "\u2002", "\u2003", "\u2004", "\u2005", "\u2006", "\u2007", "\u2008", "\u2009",
+    "\u200a", "\u2028", "\u2029", "\u202f", "\u205f", "\u3000"};
+
+std::string trimmed(std::string_view text)
+{
+    const auto atStart = [&](std::string_view space) { return text.starts_with(space); };
+    const auto atEnd = [&](std::string_view space) { return text.ends_with(space); };
+    for (auto* space = std::ranges::find_if(whiteSpace, atStart); space != std::end(whiteSpace);
+         space = std::ranges::find_if(whiteSpace, atStart))
+        text.remove_prefix(space->size());
+    for (auto* space = std::ranges::find_if(whiteSpace, atEnd); space != std::end(whiteSpace);
+         space = std::ranges::find_if(whiteSpace, atEnd))
+        text.remove_suffix(space->size());
+    return std::string(text);
+}
+
+/// What is wrong with a name as it is typed; nothing is said of an empty one.
+std::string complaintAbout(const std::string& name)
+{
+    if (name.empty() || FileUtils::isValidFilename(name))
+        return {};
+    return name.front() == '.' ? localized("Choose a different name.")
+                               : localized("Character not allowed in filename");
+}
+
+} // namespace
+
+std::shared_ptr<FilenamePrompt>
+FilenamePrompt::newWithTitleMessagePlaceholderFilenameDoneButtonTextCompletion(const MaybeText& title,
+    const MaybeText& message, const MaybeText& placeholder, const MaybeText& filename,
+    const MaybeText& doneButtonText, ValidateNewFilenameCallback completion)
+{
+    return initWithTitleMessagePlaceholderFilenameDoneButtonTextCompletion(
+        title, message, placeholder, filename, doneButtonText, std::move(completion));
+}
+
+std::shared_ptr<FilenamePrompt>
+FilenamePrompt::initWithTitleMessagePlaceholderFilenameDoneButtonTextCompletion(const MaybeText& title,
+    const MaybeText& message, const MaybeText& placeholder, const MaybeText& filename,
+    const MaybeText& doneButtonText, ValidateNewFilenameCallback completion)
+{
+    auto prompt = std::make_shared<FilenamePrompt>(Token{});
+    prompt->build({title, message, placeholder, filename, doneButtonText}, std::move(completion));
+    return prompt;
+}
+
+void FilenamePrompt::build(const Texts& texts, ValidateNewFilenameCallback completion)
+{
+    _origFilename = texts.filename;
+    _validateNewFilenameCallback = std::move(completion);
+    _alert = std::make_shared<AlertController>(
+        texts.title.value_or(""), texts.message.value_or(""), platform::ui::AlertStyle::Alert);
+    addTextField(texts);
+    addCancelAction({});
+    addDefaultAction(texts.doneButtonText);
+    _errMsgViewController = std::make_shared<SimpleTextViewController>();
+    _alert->setContentViewController(_errMsgViewController);
+    updateErrorMessage({});
+}
+
+void FilenamePrompt::addTextField(const Texts& texts)
+{
+    _alert->addTextField([&](TextField& field) {
+        field.setText(texts.filename.value_or(""));
+        field.setPlaceholder(texts.placeholder.value_or(""));
+        field.setInputTraits({.returnKey = platform::ui::ReturnKey::Done,
+            .returnKeyNeedsText = true,
+            .capitalization = platform::ui::Capitalization::Words,
+            .autocorrection = platform::ui::Autocorrection::Off,
+            .clearButton = platform::ui::ClearButton::WhileEditing});
+        field.setDelegate(weak_from_this());
+        field.setOnEditingChanged([weak = weak_from_this(), edited = field.weak_from_this()] {
+            const auto prompt = weak.lock();
+            const auto view = edited.lock();
+            if (prompt)
+                prompt->folderPromptTextFieldChanged(static_cast<const TextField*>(view.get()));
+        });
+        field.setPlacedByFrame(false);
+        const double height = field.font().lineHeight() * fieldHeightToLineHeight;
+        field.anchor(platform::ui::LayoutAttribute::Height).equalToConstant(height)->setActive(true);
+    });
+}
+
+void FilenamePrompt::addCancelAction(std::function<void()> handler)
+{
+    const auto cancel = std::make_shared<AlertAction>(
+        localized("Cancel"), AlertActionStyle::Default, [handler = std::move(handler)](const auto&) {
+            if (handler)
+                handler();
+        });
+    _alert->addAction(cancel);
+    // Nothing in its plain style says that it is the way out.
+    _alert->setEscapeAction(cancel);
+}
+
+void FilenamePrompt::addDefaultAction(const MaybeText& text)
+{
+    _defaultAction = std::make_shared<AlertAction>(
+        text && !text->empty() ? *text : localized("Done"), AlertActionStyle::Default);
+    _defaultAction->setShouldClose([weak = weak_from_this()] {
+        const auto prompt = weak.lock();
+        return prompt && prompt->handleDoneAction();
+    });
+    _defaultAction->setEnabled(_origFilename && !_origFilename->empty());
+    _alert->addAction(_defaultAction);
+}
+
+void FilenamePrompt::folderPromptTextFieldChanged(const TextField* field)
+{
+    if (!field || !_defaultAction)
+        return;
+    const auto name = trimmed(field->text());
+    updateErrorMessage(complaintAbout(name));
+    _defaultAction->setEnabled(FileUtils::isValidFilename(name));
+}
+
+bool FilenamePrompt::handleDoneAction()
+{
+    // An alert that is closing already may still see the return key.
+    if (_alert->textFields().empty() || _isAccepted)
+        return false;
+    const auto name = trimmed(_alert->textFields().front()->text());
+    if (!FileUtils::isValidFilename(name))
+        return false;
+    // Whoever is asked may let the prompt go.
+    const auto keepsSelf = shared_from_this();
+    bool accepted = false;
+    const auto message = _validateNewFilenameCallback(name, accepted);
+    if (!accepted)
+        updateErrorMessage(message);
+    _isAccepted = accepted;
+    return accepted;
+}
+
+void FilenamePrompt::updateErrorMessage(const std::string& message)
+{
+    const auto area = _errMsgViewController->view();
+    _errMsgViewController->messageLabel()->setText(message);
+    if (area->isHidden() != message.empty())
+        area->setHidden(message.empty());
+}
+
+bool FilenamePrompt::textFieldShouldReturn(TextField& field)
+{
+    static constexpr Operation op{"-[FilenamePrompt textFieldShouldReturn:]"};
+    op.debug("textFieldShouldReturn");
+    const bool mayClose = handleDoneAction();
+    if (mayClose) {
+        field.endEditing();
+        _alert->dismissViewController(true);
+    }
+    return mayClose;
+}
+
+void FilenamePrompt::textFieldDidBeginEditing(TextField& field)
+{
+    UIUtils::setCursorInTextFieldToBeforeExtension(field);
+}
+
+} // namespace tarrow

@@ -1,0 +1,89 @@
+#pragma once
+
+#include "platform/ui/TextFieldDelegate.h"
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace platform::ui {
+class AlertAction;
+class AlertController;
+} // namespace platform::ui
+
+namespace tarrow {
+
+class SimpleTextViewController;
+
+/// An alert in which the user types a name. It judges the name while it is typed, says in red what is wrong
+/// with it, and stays open until the name is accepted or the user cancels.
+///
+/// The caller presents the alert and keeps the prompt while it is shown: the alert knows the prompt only
+/// weakly, and closes for nothing but Cancel once the prompt is gone. Main thread.
+class FilenamePrompt : public platform::ui::TextFieldDelegate,
+                       public std::enable_shared_from_this<FilenamePrompt> {
+public:
+    /// Called with the name, without white space around it, when the user confirms. Sets `accepted` to close
+    /// the prompt; otherwise the answer is shown (empty: no message) and the prompt stays.
+    using ValidateNewFilenameCallback = std::function<std::string(const std::string& name, bool& accepted)>;
+    using MaybeText = std::optional<std::string>;
+
+    /// A new prompt. Without a text for the button it reads "Done". The callback is required.
+    static std::shared_ptr<FilenamePrompt> newWithTitleMessagePlaceholderFilenameDoneButtonTextCompletion(
+        const MaybeText& title, const MaybeText& message, const MaybeText& placeholder,
+        const MaybeText& filename, const MaybeText& doneButtonText, ValidateNewFilenameCallback completion);
+    static std::shared_ptr<FilenamePrompt> initWithTitleMessagePlaceholderFilenameDoneButtonTextCompletion(
+        const MaybeText& title, const MaybeText& message, const MaybeText& placeholder,
+        const MaybeText& filename, const MaybeText& doneButtonText, ValidateNewFilenameCallback completion);
+
+    const std::shared_ptr<platform::ui::AlertController>& alert() const { return _alert; }
+    const std::shared_ptr<SimpleTextViewController>& errMsgViewController() const
+    {
+        return _errMsgViewController;
+    }
+    /// The confirming button.
+    const std::shared_ptr<platform::ui::AlertAction>& defaultAction() const { return _defaultAction; }
+    /// The name that the field begins with; nothing for a new folder.
+    const MaybeText& origFilename() const { return _origFilename; }
+    const ValidateNewFilenameCallback& validateNewFilenameCallback() const
+    {
+        return _validateNewFilenameCallback;
+    }
+
+    /// The user confirms. Whether the alert may close.
+    bool handleDoneAction();
+    /// Shows a message in red; an empty one hides the area.
+    void updateErrorMessage(const std::string& message);
+    /// The user edited the name; null does nothing.
+    void folderPromptTextFieldChanged(const platform::ui::TextField* field);
+
+    bool textFieldShouldReturn(platform::ui::TextField& field) override;
+    void textFieldDidBeginEditing(platform::ui::TextField& field) override;
+
+protected:
+    struct Texts {
+        MaybeText title, message, placeholder, filename, doneButtonText;
+    };
+    struct Token {
+        explicit Token() = default;
+    };
+    void build(const Texts& texts, ValidateNewFilenameCallback completion);
+
+public:
+    explicit FilenamePrompt(Token) { }
+
+private:
+    void addTextField(const Texts& texts);
+    void addCancelAction(std::function<void()> handler);
+    void addDefaultAction(const MaybeText& text);
+
+    std::shared_ptr<platform::ui::AlertController> _alert;
+    std::shared_ptr<SimpleTextViewController> _errMsgViewController;
+    std::shared_ptr<platform::ui::AlertAction> _defaultAction;
+    MaybeText _origFilename;
+    ValidateNewFilenameCallback _validateNewFilenameCallback;
+    bool _isAccepted = false;
+};
+
+} // namespace tarrow

@@ -1,0 +1,16 @@
+#pragma once
+
+#include "prompts/FilenamePrompt.h"
+
+namespace tarrow {
+
+/// Asks for the name of a new folder.
+class NewFolderPrompt : public FilenamePrompt {
+public:
+    using FilenamePrompt::FilenamePrompt;
+
+    static std::shared_ptr<NewFolderPrompt> newWithTitleDoneButtonTextCompletion(
+        const std::string& title, const std::string& doneButtonText, ValidateNewFilenameCallback completion);
+};
+
+} // namespace tarrow

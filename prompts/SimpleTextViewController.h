@@ -1,0 +1,30 @@
+#pragma once
+
+#include "platform/ui/Font.h"
+#include "platform/ui/ViewController.h"
+
+namespace platform::ui {
+class Label;
+}
+
+namespace tarrow {
+
+/// A short message in red, as tall as its text, for the inside of an alert. Made with std::make_shared. Main
+/// thread.
+class SimpleTextViewController : public platform::ui::ViewController {
+public:
+    /// Null before the view is loaded.
+    const std::shared_ptr<platform::ui::Label>& messageLabel() const { return _messageLabel; }
+    platform::ui::Font messageLabelFont() const;
+
+    void viewDidLoad() override;
+
+private:
+    /// Points between the label and either side of the view.
+    double _labelHorizontalInsets() const { return 16.0; }
+    void constrainLabel();
+
+    std::shared_ptr<platform::ui::Label> _messageLabel;
+};
+
+} // namespace tarrow
