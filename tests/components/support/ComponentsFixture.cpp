@@ -84,6 +84,8 @@ ComponentsFixture::ComponentsFixture()
     _set.previewSupport = borrowed(_driveServices.previewSupport());
     _set.storageOfferManager = borrowed(_driveServices.storageOfferManager());
     _set.typeRegistry = borrowed(_driveServices.typeRegistry());
+    _set.keyedArchiver = borrowed(_driveServices.keyedArchiver());
+    _set.userDefaults = borrowed(_driveServices.userDefaults());
     platform::installServices(_set);
 }
 

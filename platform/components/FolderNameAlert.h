@@ -1,0 +1,17 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <string>
+
+namespace platform::ui {
+class AlertController;
+} // namespace platform::ui
+
+namespace platform::components {
+
+/// An alert that asks for the name of a folder to be made. `chosen` is called once, after it has closed, with
+/// a name that can be one; not when the user cancels. Main thread only.
+std::shared_ptr<ui::AlertController> makeFolderNameAlert(std::function<void(const std::string&)> chosen);
+
+} // namespace platform::components

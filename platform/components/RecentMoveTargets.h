@@ -1,0 +1,20 @@
+#pragma once
+
+#include "platform/Url.h"
+
+#include <cstddef>
+#include <vector>
+
+namespace platform::components {
+
+/// The folders that items were moved to last, the latest one first, kept between runs. They may be gone by
+/// now. Main thread only.
+class RecentMoveTargets {
+public:
+    static constexpr std::size_t kept = 8; ///< more than are shown, as some of them do not fit a move
+
+    static std::vector<Url> folders();
+    static void remember(const Url& folder);
+};
+
+} // namespace platform::components
