@@ -8,6 +8,9 @@
 
 namespace platform {
 
+/// The code in errorDomain::cloud for what no bookmark string can name. It is an ordinary answer, no fault.
+inline constexpr int notBookmarkableCode = 7;
+
 /// Where items of the drive lie, and the texts that name them on other devices.
 class CloudItems {
 public:
@@ -26,6 +29,12 @@ public:
     /// error. Errors: FileErrorCode::NoSuchItem, FileErrorCode::Unsupported for what is no document,
     /// FileErrorCode::Cancelled for one that changes meanwhile, else the system's. Any thread.
     virtual std::optional<Error> evictItem(const Url& url) = 0;
+
+    /// Makes the bookmark string that names a document on the account's other devices; it outlives moves and
+    /// new names of the document. The completion is called once, on any thread; with notBookmarkableCode for
+    /// what no other device could open (it lies outside the drive's documents, or is not there).
+    virtual void RZBookmarkableStringFromDocumentURL(
+        const Url& url, std::function<void(Result<std::string>)> completion) const = 0;
 
     /// Finds the document that a bookmark string from another device names. The completion is called once, on
     /// any thread, with the URL or the error (damaged, too large, unknown account or document).

@@ -14,6 +14,7 @@ enum class Notification {
     ApplicationWillResignActive,
     CloudIdentityDidChange,
     StorageOfferDidChange,
+    ActivityOffersDidChange, ///< what other devices hand over; see ActivityHandOver
     KeyValueStoreDidChangeExternally,
     KeyboardWillShow, ///< user information: "height" in points
     KeyboardWillHide,

@@ -4,6 +4,7 @@
 
 namespace platform {
 
+class ActivityHandOver;
 class AppRegistry;
 class CharacterData;
 class CloudDocumentService;
@@ -25,6 +26,7 @@ class UserDefaults;
 
 /// The installed platform services. A service that is not installed is null; main installs all of them.
 struct ServiceSet {
+    std::shared_ptr<ActivityHandOver> activityHandOver;
     std::shared_ptr<AppRegistry> appRegistry;
     std::shared_ptr<CharacterData> characterData;
     std::shared_ptr<CloudDocumentService> cloudDocumentService;
@@ -53,6 +55,7 @@ public:
     {
     }
 
+    ActivityHandOver& activityHandOver() const { return *_set.activityHandOver; }
     AppRegistry& appRegistry() const { return *_set.appRegistry; }
     CharacterData& characterData() const { return *_set.characterData; }
     CloudDocumentService& cloudDocumentService() const { return *_set.cloudDocumentService; }

@@ -7,10 +7,14 @@
 
 namespace platform {
 
-/// Something the user was doing elsewhere (on another device, in the system search) and goes on with here.
+/// Something that the user does here, or was doing elsewhere (on another device, in the system search) and
+/// goes on with here.
 struct UserActivity {
     std::string type;
-    PropertyDictionary userInfo;
+    PropertyDictionary userInfo{};
+    bool isEligibleForHandOff = false; ///< whether the account's other devices may go on with it
+
+    bool operator==(const UserActivity&) const = default;
 };
 
 namespace activityType {

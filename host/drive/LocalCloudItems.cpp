@@ -3,6 +3,7 @@
 #include "host/drive/AccountRecord.h"
 #include "host/drive/BeneathRoot.h"
 #include "host/drive/Bookmark.h"
+#include "host/drive/BookmarkMaking.h"
 #include "host/drive/ItemFacts.h"
 #include "host/drive/LinkRecords.h"
 #include "host/drive/LocalItemChanges.h"
@@ -120,6 +121,15 @@ std::optional<Error> LocalCloudItems::evictItem(const Url& url)
 std::optional<Url> LocalCloudItems::documentWithIdentifier(std::uint32_t identifier) const
 {
     return findDocument(_layout, *_index, identifier);
+}
+
+void LocalCloudItems::RZBookmarkableStringFromDocumentURL(
+    const Url& url, std::function<void(Result<std::string>)> completion) const
+{
+    _queue->async([layout = _layout, url, completion = std::move(completion)] {
+        completion(makeBookmark(
+            layout, url, [&layout](const std::string& path) { return identifierAt(layout, path); }));
+    });
 }
 
 void LocalCloudItems::decodeBookmark(

@@ -18,6 +18,8 @@ public:
     bool isInTrash(const platform::Url& url) const override;
     platform::Url realURL(const platform::Url& url) const override;
     std::optional<platform::Error> evictItem(const platform::Url& url) override;
+    void RZBookmarkableStringFromDocumentURL(const platform::Url& url,
+        std::function<void(platform::Result<std::string>)> completion) const override;
     void decodeBookmark(const std::string& bookmark,
         std::function<void(platform::Result<platform::Url>)> completion) const override;
     std::optional<platform::Url> documentWithIdentifier(std::uint32_t identifier) const override;

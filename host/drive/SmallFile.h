@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/system/FileDescriptor.h"
+#include "platform/CloudItems.h"
 #include "platform/Error.h"
 
 #include <cstddef>
@@ -21,7 +22,13 @@ platform::Result<std::string> readSmallFile(
 platform::Error itemError(int errorNumber, const std::string& path);
 
 /// Codes of errorDomain::cloud.
-enum class CloudErrorCode : int { DamagedRecord = 1, OutsideDrive, UnknownContainer, UnusableBookmark };
+enum class CloudErrorCode : int {
+    DamagedRecord = 1,
+    OutsideDrive,
+    UnknownContainer,
+    UnusableBookmark,
+    NotBookmarkable = platform::notBookmarkableCode,
+};
 
 /// A record of the drive that cannot be used: the cloud domain, with a sentence for the user and, as the
 /// failure reason, what the log says of it.

@@ -219,4 +219,74 @@ TEST_F(CloudItemTests, bookmarksOfOthersAndOfPlacesOutsideAreRefused)
     EXPECT_TRUE(decode(_bookmark.encoded()).error);
 }
 
+class BookmarkMaking : public CloudItemTests {
+protected:
+    platform::Result<std::string> make(const Url& url)
+    {
+        std::vector<platform::Result<std::string>> answers;
+        items().RZBookmarkableStringFromDocumentURL(
+            url, [&](platform::Result<std::string> answer) { answers.push_back(std::move(answer)); });
+        EXPECT_TRUE(answers.empty()) << "the caller is not made to wait for the disk";
+        _drive.settle();
+        EXPECT_EQ(answers.size(), 1U);
+        return answers.empty() ? platform::Result<std::string>() : answers.front();
+    }
+};
+
+TEST_F(BookmarkMaking, namesADocumentForOtherDevices)
+{
+    _drive.makeContainer("app.example.Notes");
+    host::drive::PromiseRecord promise;
+    promise.documentIdentifier = 9;
+    const Url rows[] = {
+        _drive.writeDocument("Documents/a.txt"),
+        identified("Documents/Süß & salzig.txt", "7"),
+        _drive.writePromise("Documents/promised.txt", promise),
+        Url::fileURL(_drive.layout().containerDocuments("app.example.Notes") + "/note.txt"),
+    };
+    std::ofstream(rows[3].path()) << "note";
+    for (const auto& document : rows) {
+        const auto text = make(document);
+        ASSERT_TRUE(text) << document.path();
+        EXPECT_EQ(decode(*text).value, document);
+    }
+    _drive.writeLink("way", "Documents");
+    EXPECT_EQ(decode(*make(_drive.url("way/a.txt"))).value, rows[0]) << "the place without the link";
+}
+
+TEST_F(BookmarkMaking, refusesWhatNoOtherDeviceCanOpen)
+{
+    const auto outside = _drive.folder().write("outside/a.txt", "");
+    _drive.writeLink("outer", _drive.folder().at("outside"));
+    _drive.makeContainer("app.example.Notes");
+    const auto container = _drive.layout().container("app.example.Notes");
+    std::ofstream(container + "/settings.json") << "{}";
+    const std::string name(200, 'n');
+    auto deep = std::string("Documents");
+    for (int i = 0; i < 16; ++i)
+        deep += '/' + name;
+    const Url rows[] = {
+        Url::fileURL(outside),
+        _drive.url("outer/a.txt"),
+        _drive.url("Documents/not there.txt"),
+        Url::fileURL(_drive.layout().trash() + "/a.txt"),
+        Url::fileURL(_drive.layout().account()),
+        _drive.layout().documentsURL(),
+        _drive.layout().defaultContainerURL(),
+        Url::fileURL(container + "/settings.json"),
+        _drive.writeDocument("Documents/\xff.txt"),
+        _drive.writeDocument(deep + "/a.txt"),
+        *Url::parse("https://example.org/a.txt"),
+    };
+    for (const auto& url : rows) {
+        const auto text = make(url);
+        ASSERT_TRUE(text.error) << url.path();
+        EXPECT_EQ(text.error->domain(), platform::errorDomain::cloud);
+        EXPECT_EQ(text.error->code(), platform::notBookmarkableCode) << url.path();
+    }
+    const auto document = _drive.writeDocument("Documents/a.txt");
+    _drive.signOut();
+    EXPECT_EQ(make(document).error->code(), platform::notBookmarkableCode);
+}
+
 } // namespace
