@@ -1,6 +1,5 @@
 #include "items/FileUtils.h"
 #include "items/UrlResolution.h"
-#include "platform/Localization.h"
 #include "platform/ui/TextField.h"
 #include "prompts/UIUtils.h"
 
@@ -19,15 +18,6 @@ std::size_t characterCount(std::string_view text)
         text, [](char byte) { return (static_cast<unsigned char>(byte) & 0xC0U) != 0x80U; }));
 }
 
-/// A reference whose document cannot be told is renamed no more than one whose document is gone.
-Error lostReference(const Url& reference)
-{
-    const auto description = platform::localized("“%@” is no longer there.", {reference.lastPathComponent()});
-    return Error(FileErrorCode::NoSuchFile,
-        {{std::string(platform::errorKey::localizedDescription), description},
-            {std::string(platform::errorKey::filePath), reference.path()}});
-}
-
 } // namespace
 
 UIUtils::MaybeError UIUtils::renameItemAtURLToName(const Url& url, const std::string& name)
@@ -42,17 +32,16 @@ UIUtils::MaybeError UIUtils::renameItemAtURLToName(const Url& url, const std::st
         return Error(FileErrorCode::InvalidName);
     }
     op.debug("Name is valid: %@", name);
-    const auto resolved = trw_URLByResolvingBookmark(url);
+    // A reference that cannot be read any more is an item like any other.
+    const auto resolved = trw_URLByResolvingBookmark(url).value_or(url);
     if (services().cloudDocumentService().promisedItems().isExternalDocumentReference(url))
         op.debug("Renaming bookmark %@ (%@)", url, resolved);
-    if (!resolved)
-        return lostReference(url);
-    const auto destination = computeNewURLNewBasename(*resolved, name);
-    if (*resolved == destination) {
-        op.debug("Rename: Old and new URLs are the same: %@ - %@", *resolved, destination);
+    const auto destination = computeNewURLNewBasename(resolved, name);
+    if (resolved == destination) {
+        op.debug("Rename: Old and new URLs are the same: %@ - %@", resolved, destination);
         return std::nullopt;
     }
-    return FileUtils::moveTo(*resolved, destination);
+    return FileUtils::moveTo(resolved, destination);
 }
 
 Url UIUtils::computeNewURLNewBasename(const Url& url, const std::string& name)

@@ -1,0 +1,253 @@
+#include "host/system/UnicodeCharacterData.h"
+#include "platform/Services.h"
+#include "platform/ui/AlertController.h"
+#include "platform/ui/Label.h"
+#include "platform/ui/TextField.h"
+#include "platform/ui/Window.h"
+#include "prompts/NewFolderPrompt.h"
+#include "prompts/RenamePrompt.h"
+#include "prompts/SimpleTextViewController.h"
+#include "tests/support/PlainTexts.h"
+#include "tests/support/RecordingLog.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+namespace tarrow {
+namespace {
+
+using platform::ui::AlertActionStyle;
+using platform::ui::TextField;
+using platform::ui::TextRange;
+using platform::ui::ViewController;
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+class FilenamePromptTest : public testing::Test {
+protected:
+    FilenamePromptTest()
+    {
+        platform::ServiceSet set;
+        set.localization = std::make_shared<testing_support::PlainTexts>();
+        set.characterData = std::make_shared<host::system::UnicodeCharacterData>();
+        platform::installServices(std::move(set));
+        window->setRootViewController(root);
+        window->makeKeyAndVisible();
+    }
+    ~FilenamePromptTest() override
+    {
+        platform::installServices({});
+        platform::installLogSink(nullptr);
+    }
+
+    /// What the caller does with a name: keeps it, and answers as the test wants.
+    FilenamePrompt::ValidateNewFilenameCallback callback()
+    {
+        return [this](const std::string& name, bool& accepted) {
+            EXPECT_FALSE(accepted);
+            confirmed.push_back(name);
+            accepted = accepts;
+            return refusal;
+        };
+    }
+    void rename(const std::string& name) { show(RenamePrompt::newWithFilenameCompletion(name, callback())); }
+    void newFolder()
+    {
+        show(NewFolderPrompt::newWithTitleDoneButtonTextCompletion("New Folder", "Create", callback()));
+    }
+    void show(std::shared_ptr<FilenamePrompt> made)
+    {
+        prompt = std::move(made);
+        alert = prompt->alert();
+        root->presentViewController(alert, true);
+    }
+    TextField& field() const { return *alert->textFields().front(); }
+    void type(const std::string& text) const { field().userEdited(text, {text.size(), 0}); }
+    bool pressDone() const { return alert->press(1); }
+    bool isOpen() const { return root->presentedViewController() == alert; }
+    /// The red message; nothing while its area is hidden.
+    std::optional<std::string> message() const
+    {
+        const auto area = std::static_pointer_cast<SimpleTextViewController>(alert->contentViewController());
+        if (area->view()->isHidden())
+            return std::nullopt;
+        return area->messageLabel()->text();
+    }
+
+    std::shared_ptr<testing_support::RecordingLog> log = testing_support::RecordingLog::install();
+    std::shared_ptr<ViewController> root = std::make_shared<ViewController>();
+    std::shared_ptr<platform::ui::Window> window =
+        std::make_shared<platform::ui::Window>(platform::Rect{0, 0, 400, 800});
+    std::shared_ptr<FilenamePrompt> prompt;
+    std::shared_ptr<platform::ui::AlertController> alert;
+    std::vector<std::string> confirmed;
+    bool accepts = false;
+    std::string refusal = "Name is already taken";
+};
+
+TEST_F(FilenamePromptTest, ANewFolderBeginsWithoutAName)
+{
+    newFolder();
+    EXPECT_EQ(alert->title(), "New Folder");
+    EXPECT_EQ(alert->message(), "Enter a name for this folder.");
+    EXPECT_EQ(field().text(), "");
+    EXPECT_EQ(field().placeholder(), "Folder Name");
+    EXPECT_EQ(message(), std::nullopt);
+    ASSERT_EQ(alert->actions().size(), 2);
+    EXPECT_EQ(alert->actions()[0]->title(), "Cancel");
+    EXPECT_EQ(alert->actions()[1]->title(), "Create");
+    for (const auto& action : alert->actions())
+        EXPECT_EQ(action->style(), AlertActionStyle::Default);
+    EXPECT_FALSE(prompt->defaultAction()->isEnabled());
+    EXPECT_FALSE(field().userPressedReturn()) << "the return key needs a text";
+    EXPECT_THAT(confirmed, IsEmpty());
+}
+
+TEST_F(FilenamePromptTest, ARenameBeginsBeforeTheExtension)
+{
+    struct Row {
+        const char* name;
+        std::size_t caret;
+    };
+    for (const Row row : {Row{"Notes.txt", 5}, {"Archive.tar.gz", 11}, {"README", 6}, {"\u65e5\u672c.md", 2},
+             {"\U0001f600 e\u0301.txt", 4}, {"\u0645\u0644\u0641.pdf", 3}, {"Notes.", 5}}) {
+        SCOPED_TRACE(row.name);
+        rename(row.name);
+        EXPECT_EQ(prompt->origFilename(), row.name);
+        EXPECT_TRUE(field().isEditing());
+        EXPECT_EQ(field().selectedRange(), (TextRange{row.caret, 0}));
+        EXPECT_TRUE(prompt->defaultAction()->isEnabled());
+        EXPECT_EQ(prompt->defaultAction()->title(), "Done");
+        EXPECT_TRUE(alert->press(0));
+    }
+    EXPECT_THAT(confirmed, IsEmpty()) << "Cancel asks nobody";
+}
+
+TEST_F(FilenamePromptTest, NamesAreJudgedWhileTheyAreTyped)
+{
+    const std::string different = "Choose a different name.", character = "Character not allowed in filename";
+    const std::optional<std::string> silent;
+    struct Row {
+        std::string text;
+        std::optional<std::string> message;
+        bool usable;
+    };
+    const std::vector<Row> rows{{"Notes", silent, true}, {"", silent, false}, {" \t\u00a0", silent, false},
+        {".Notes", different, false}, {"  .", different, false}, {"a/b", character, false},
+        {"a:b", character, false}, {"a\u0007b", character, false}, {"a\u0378", character, false},
+        {"a\ufdd0", character, false}, {"\u202etxt.exe", character, false}, {"a\u2028b", character, false},
+        {" Notes.txt \n", silent, true}, {"\u0645\u0644\u0641", silent, true}, {"\U0001f600", silent, true},
+        {std::string(300, 'x'), silent, true}};
+    newFolder();
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.text);
+        type(row.text);
+        EXPECT_EQ(message(), row.message);
+        EXPECT_EQ(prompt->defaultAction()->isEnabled(), row.usable);
+        EXPECT_EQ(pressDone(), false);
+        EXPECT_FALSE(!row.usable && field().userPressedReturn());
+        EXPECT_EQ(field().text(), row.text) << "the field keeps what was typed";
+    }
+    EXPECT_THAT(confirmed,
+        ElementsAre("Notes", "Notes.txt", "\u0645\u0644\u0641", "\U0001f600", std::string(300, 'x')));
+    prompt->folderPromptTextFieldChanged(nullptr);
+    EXPECT_EQ(message(), refusal);
+}
+
+TEST_F(FilenamePromptTest, StaysOpenUntilANameIsAccepted)
+{
+    for (const bool byReturn : {false, true}) {
+        SCOPED_TRACE(byReturn);
+        const auto confirm = [&] { return byReturn ? field().userPressedReturn() : pressDone(); };
+        accepts = false;
+        confirmed.clear();
+        rename("Notes.txt");
+        EXPECT_FALSE(confirm());
+        EXPECT_TRUE(isOpen());
+        EXPECT_TRUE(field().isEditing()) << "the keyboard stays";
+        EXPECT_EQ(message(), "Name is already taken");
+        type("\u3000Plans ");
+        EXPECT_EQ(message(), std::nullopt) << "an edit is judged anew";
+        accepts = true;
+        EXPECT_TRUE(confirm());
+        EXPECT_FALSE(isOpen());
+        confirm();
+        EXPECT_THAT(confirmed, ElementsAre("Notes.txt", "Plans"))
+            << "an accepted name is not asked for again";
+    }
+    EXPECT_EQ(log->count("DEBUG textFieldShouldReturn"), 3);
+}
+
+TEST_F(FilenamePromptTest, ARefusalWithoutWordsShowsNothing)
+{
+    refusal.clear();
+    rename("Notes.txt");
+    type("a/b");
+    ASSERT_TRUE(message());
+    type("Plans");
+    EXPECT_FALSE(pressDone());
+    EXPECT_EQ(message(), std::nullopt);
+    EXPECT_TRUE(isOpen());
+}
+
+TEST_F(FilenamePromptTest, AnAlertOutlivesItsPrompt)
+{
+    rename("Notes.txt");
+    accepts = true;
+    const std::weak_ptr<FilenamePrompt> weak = prompt;
+    prompt = nullptr;
+    EXPECT_TRUE(weak.expired());
+    EXPECT_FALSE(pressDone());
+    type("a/b");
+    EXPECT_EQ(message(), std::nullopt) << "nobody judges it any more";
+    field().userPressedReturn();
+    EXPECT_TRUE(isOpen());
+    EXPECT_THAT(confirmed, IsEmpty());
+    alert->userCancelled();
+    EXPECT_FALSE(isOpen()) << "but there is a way out";
+}
+
+TEST_F(FilenamePromptTest, ThePromptMayBeDroppedWhileItAsks)
+{
+    for (const bool byReturn : {false, true}) {
+        show(RenamePrompt::newWithFilenameCompletion("Notes", [this](const std::string&, bool& accepted) {
+            prompt = nullptr;
+            accepted = true;
+            return std::string();
+        }));
+        EXPECT_TRUE(byReturn ? field().userPressedReturn() : pressDone());
+        EXPECT_FALSE(isOpen());
+    }
+}
+
+TEST_F(FilenamePromptTest, EveryTextMayBeLeftOut)
+{
+    show(FilenamePrompt::newWithTitleMessagePlaceholderFilenameDoneButtonTextCompletion(
+        {}, {}, {}, {}, "", callback()));
+    EXPECT_EQ(alert->title() + alert->message() + field().placeholder() + field().text(), "");
+    EXPECT_EQ(prompt->defaultAction()->title(), "Done");
+    EXPECT_FALSE(prompt->defaultAction()->isEnabled());
+}
+
+TEST_F(FilenamePromptTest, TheMessageIsAsTallAsItsText)
+{
+    const auto area = std::make_shared<SimpleTextViewController>();
+    const auto heightOf = [&](const std::string& text) {
+        area->view();
+        area->messageLabel()->setText(text);
+        return area->view()->systemLayoutSizeFitting({300, 0}).height;
+    };
+    const double line = area->messageLabelFont().lineHeight();
+    EXPECT_NEAR(heightOf("Short"), line, 1);
+    std::string words;
+    for (int i = 0; i < 200; ++i)
+        words += "word ";
+    EXPECT_NEAR(heightOf(words), 5 * line, 1) << "five lines at most";
+    area->view()->setFrame({0, 0, 300, 5 * line});
+    area->view()->layoutIfNeeded();
+    EXPECT_EQ(area->messageLabel()->frame().x, 16);
+    EXPECT_EQ(area->messageLabel()->frame().width, 300 - 2 * 16);
+}
+
+} // namespace
+} // namespace tarrow
