@@ -1,0 +1,241 @@
+#include "platform/components/DocumentListAction.h"
+#include "platform/components/DocumentListController.h"
+#include "platform/ui/AlertController.h"
+#include "platform/ui/Label.h"
+#include "platform/ui/TextField.h"
+#include "platform/ui/View.h"
+#include "prompts/FilenamePrompt.h"
+#include "prompts/SimpleTextViewController.h"
+#include "tests/browser/support/BrowserFixture.h"
+
+#include <gmock/gmock.h>
+
+#include <filesystem>
+
+namespace tarrow {
+namespace {
+
+using namespace testing_support;
+using platform::Url;
+using platform::components::DocumentListAction;
+using testing::ElementsAre;
+
+class ItemActionsTest : public BrowserFixture {
+protected:
+    void perform(DocumentListAction action, const Url& item) { perform(static_cast<int>(action), item); }
+    void perform(int action, const Url& item)
+    {
+        browser->documentListControllerPerformActionURLOriginatingViewCompletion(
+            topList(), action, item, topList()->view(), [this] { ++completions; });
+        settle();
+    }
+    /// Types a name into the prompt that is shown and confirms it; answers the message that it leaves.
+    std::string enter(const std::string& name)
+    {
+        const auto prompt = browser->folderPromptAlert();
+        prompt->alert()->textFields().front()->userEdited(name, {name.size(), 0});
+        prompt->alert()->press(1);
+        settle();
+        return prompt->errMsgViewController()->messageLabel()->text();
+    }
+    void remove(const std::vector<Url>& items)
+    {
+        browser->showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(
+            items, nullptr, topList(), [this] { ++completions; });
+    }
+    bool isThere(std::string_view path) const { return std::filesystem::exists(url(path).path()); }
+    /// The title of the alert that is shown, which is closed; empty without one.
+    std::string takeAlert()
+    {
+        const auto shown = alert();
+        const auto title = shown ? shown->title() : std::string();
+        if (shown)
+            shown->press(0);
+        settle();
+        return title;
+    }
+
+    int completions = 0;
+};
+
+TEST_F(ItemActionsTest, ANewFolderIsMadeUnderAFreeName)
+{
+    write("Taken/a.txt");
+    launch();
+    browser->promtForNewFolderAndCreate(nullptr);
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_EQ(alert()->title(), "New Folder");
+    EXPECT_EQ(alert()->actions()[1]->title(), "Create");
+    EXPECT_EQ(enter("Taken"), "Name is already taken");
+    EXPECT_NE(alert(), nullptr);
+    EXPECT_EQ(log->count("INFO Item exists at path: "
+                  + logText(Url::fileURL(url("Taken").path(), platform::PathKind::Directory))),
+        1);
+    EXPECT_EQ(enter("  Plans "), "");
+    EXPECT_EQ(alert(), nullptr);
+    EXPECT_TRUE(std::filesystem::is_directory(url("Plans").path()));
+    EXPECT_EQ(log->count("INFO New folder entered: Plans"), 1);
+    EXPECT_THAT(log->activities(),
+        testing::IsSupersetOf({"Pressed NewFolder", "Show New Folder Prompt (nav, during move)",
+            "New Folder name entry Confirmed"}));
+
+    browser->showNewFolderPromptDuringMoveItemsToMove(std::nullopt, {});
+    EXPECT_EQ(alert(), nullptr);
+    EXPECT_EQ(log->count("WARNING dlc.presentedURL is nil"), 1);
+}
+
+TEST_F(ItemActionsTest, ItemsFollowIntoTheFolderThatIsMadeForThem)
+{
+    const auto a = write("a.txt"), b = write("b.txt");
+    launch();
+    browser->showNewFolderPromptDuringMoveItemsToMove(*topList()->presentedURL(), {a, b});
+    EXPECT_EQ(alert()->title(), "Move 2 Items");
+    EXPECT_EQ(alert()->actions()[1]->title(), "Move");
+    EXPECT_EQ(enter("Both"), "");
+    EXPECT_EQ(alert(), nullptr);
+    EXPECT_TRUE(isThere("Both/a.txt") && isThere("Both/b.txt"));
+
+    const auto c = write("c.txt");
+    browser->showNewFolderPromptDuringMoveItemsToMove(
+        *topList()->presentedURL(), {url("gone.txt"), c, url("lost.txt")});
+    EXPECT_EQ(enter("Some"), "2 items couldn’t be moved.");
+    EXPECT_NE(alert(), nullptr) << "it stays over the new folder";
+    EXPECT_TRUE(isThere("Some/c.txt")) << "a failure does not stop the others";
+}
+
+TEST_F(ItemActionsTest, WhatCouldNotBeMovedIsSaid)
+{
+    write("Folder/a.txt");
+    launch();
+    const auto move = [this](const std::vector<Url>& items) {
+        browser->moveItemsToDirectoryAndShowErrorsToDirectory(items, url("Folder"));
+        return takeAlert();
+    };
+    EXPECT_EQ(move({write("b.txt")}), "");
+    EXPECT_EQ(move({write("a.txt")}), "An item named “a.txt” already exists in the new location.");
+    EXPECT_EQ(move({url("x"), write("c.txt"), url("y")}), "2 items couldn’t be moved.");
+    EXPECT_TRUE(isThere("Folder/c.txt"));
+}
+
+TEST_F(ItemActionsTest, AnItemIsRenamed)
+{
+    const auto report = write("Report.pdf");
+    write("Plans.pdf");
+    launch();
+    perform(DocumentListAction::Rename, report);
+    EXPECT_EQ(completions, 1);
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_EQ(alert()->title(), "Rename Item");
+    EXPECT_EQ(alert()->textFields().front()->text(), "Report.pdf");
+    EXPECT_EQ(enter("Plans"), "Name is already taken");
+    EXPECT_EQ(enter("Summary"), "");
+    EXPECT_EQ(alert(), nullptr);
+    EXPECT_TRUE(isThere("Summary.pdf") && !isThere("Report.pdf"));
+    EXPECT_THAT(
+        log->activities(), testing::IsSupersetOf({"DLC Action Rename", "Rename entry confirmed (nav)"}));
+
+    perform(DocumentListAction::Rename, url("gone.txt"));
+    EXPECT_EQ(alert(), nullptr);
+}
+
+TEST_F(ItemActionsTest, SpecialFoldersStayAsTheyAre)
+{
+    const auto other = write("other.txt");
+    launch();
+    for (const char* name : {"Desktop", "Documents"}) {
+        perform(DocumentListAction::Rename, url(name));
+        EXPECT_EQ(takeAlert(), "This operation is not supported.");
+        perform(DocumentListAction::Delete, url(name));
+        EXPECT_EQ(takeAlert(), "This operation is not supported.");
+        remove({other, url(name)});
+        EXPECT_EQ(takeAlert(), "This operation is not supported.");
+        EXPECT_TRUE(isThere(name));
+    }
+    EXPECT_TRUE(isThere("other.txt"));
+    EXPECT_EQ(completions, 6);
+    EXPECT_EQ(log->count("WARNING Not renaming special folder: " + logText(url("Desktop"))), 1);
+}
+
+TEST_F(ItemActionsTest, ADeletionIsConfirmedFirst)
+{
+    const auto budget = write("Budget.txt");
+    launch();
+    perform(DocumentListAction::Delete, budget);
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_THAT(alert()->message(), testing::StartsWith("\"Budget.txt\" will be permanently deleted"));
+    EXPECT_EQ(completions, 0) << "the action ends with the answer";
+    alert()->userCancelled();
+    EXPECT_EQ(completions, 1);
+    EXPECT_TRUE(isThere("Budget.txt"));
+
+    perform(DocumentListAction::Delete, budget);
+    EXPECT_TRUE(alert()->press(0));
+    EXPECT_EQ(completions, 2);
+    EXPECT_FALSE(isThere("Budget.txt"));
+    EXPECT_EQ(alert(), nullptr);
+    EXPECT_EQ(log->count("INFO Deleting item " + logText(budget)), 1);
+    EXPECT_THAT(log->activities(),
+        ElementsAre("DLC Action Delete", "Delete was Cancelled (nav)", "DLC Action Delete",
+            "Delete was Confirmed (nav)"));
+}
+
+TEST_F(ItemActionsTest, FailedDeletionsAreCounted)
+{
+    launch();
+    const auto gone = write("gone.txt"), lost = write("lost.txt"), kept = write("kept.txt");
+    remove({gone, kept});
+    std::filesystem::remove(gone.path());
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_TRUE(alert()->press(0));
+    EXPECT_NE(takeAlert(), "") << "the one error is shown";
+    EXPECT_FALSE(isThere("kept.txt"));
+
+    write("kept.txt");
+    remove({gone, kept, lost});
+    std::filesystem::remove(lost.path());
+    EXPECT_TRUE(alert()->press(0));
+    EXPECT_EQ(takeAlert(), "2 items couldn’t be deleted.");
+    EXPECT_FALSE(isThere("kept.txt")) << "a failure does not stop the others";
+    EXPECT_EQ(completions, 2);
+}
+
+TEST_F(ItemActionsTest, AppLibrariesAreDeletedWholeButNeverTheDrive)
+{
+    const auto recipes = drive.makeContainer("app.recipes");
+    std::filesystem::create_directories(recipes.appendingPathComponent("Soups").path());
+    const auto document = write("a.txt");
+    launch();
+    remove({recipes, document});
+    EXPECT_EQ(alert(), nullptr);
+    EXPECT_EQ(log->count("ERROR Not Deleting: mix of containers and items: "
+                  + logText(std::vector<Url>{recipes, document})),
+        1);
+
+    remove({recipes, *topList()->presentedURL()});
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_TRUE(alert()->press(0));
+    EXPECT_FALSE(std::filesystem::exists(recipes.path()));
+    EXPECT_TRUE(isThere("a.txt"));
+    EXPECT_EQ(takeAlert(), "Mishap exception");
+    EXPECT_EQ(log->count("INFO Deleting container app.recipes"), 1);
+    EXPECT_EQ(log->count("ERROR NOT Deleting root container BrindleDefault"), 1);
+    EXPECT_EQ(completions, 2);
+}
+
+TEST_F(ItemActionsTest, CodesThatNobodyOffers)
+{
+    const auto document = write("a.txt");
+    launch();
+    perform(DocumentListAction::More, document);
+    EXPECT_EQ(completions, 0);
+    EXPECT_EQ(log->count("ERROR performAction:1 -- More is deprecated, unexpected value"), 1);
+    perform(7, document);
+    EXPECT_EQ(completions, 1);
+    EXPECT_EQ(log->count("ERROR performAction:7 -- unexpected value"), 1);
+    browser->documentListControllerPerformActionURL(
+        topList(), static_cast<int>(DocumentListAction::Rename), document);
+    EXPECT_EQ(alert()->title(), "Rename Item");
+}
+
+} // namespace
+} // namespace tarrow
