@@ -1,13 +1,12 @@
 #include "app/SchemeEntry.h"
 
 #include "items/UrlResolution.h"
+#include "platform/DocumentSharing.h"
 #include "preview/PreviewMode.h"
 
 namespace tarrow {
 
 namespace {
-
-constexpr std::string_view applicationScheme = "tarrowdriveapp";
 
 std::optional<Url> targetOf(const Url& url)
 {
@@ -38,7 +37,7 @@ int previewModeOf(const Url& url)
 std::optional<SchemeEntry> SchemeEntry::parse(std::string_view text)
 {
     const auto url = Url::parse(text);
-    if (!url || url->scheme() != applicationScheme)
+    if (!url || url->scheme() != platform::applicationScheme)
         return std::nullopt;
     return SchemeEntry{targetOf(*url), previewModeOf(*url)};
 }

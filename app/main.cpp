@@ -1,5 +1,6 @@
 #include "app/AppDelegate.h"
 #include "host/drive/LocalCloudDocumentService.h"
+#include "host/gtk/DesktopSharing.h"
 #include "host/gtk/LaunchContext.h"
 #include "host/gtk/MakeApplication.h"
 #include "host/system/GLibDispatch.h"
@@ -65,6 +66,7 @@ ServiceSet systemServices(const std::string& executable, const UserLocale& local
     set.typeRegistry = types;
     set.appRegistry = std::make_shared<host::system::GioAppRegistry>(
         types, "app.tarrow.Drive", host::gtk::makeLaunchContext);
+    set.documentSharing = std::make_shared<host::gtk::DesktopSharing>(types);
     set.folderLister =
         std::make_shared<host::system::ThreadedFolderLister>(set.dispatch, types, locale.formats);
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(types);

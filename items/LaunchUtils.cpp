@@ -2,6 +2,7 @@
 
 #include "items/FileUtils.h"
 #include "items/UrlResolution.h"
+#include "platform/components/DocumentInteractionSheet.h"
 #include "platform/components/DocumentListController.h"
 
 #include <algorithm>
@@ -9,6 +10,7 @@
 namespace tarrow {
 
 using platform::AppHandle;
+using platform::components::DocumentInteractionSheet;
 using platform::components::DocumentListController;
 
 namespace {
@@ -151,8 +153,10 @@ bool LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(
         return false;
     // Shared, because the action may run after this call.
     const auto opened = std::make_shared<bool>(false);
-    DocumentListController::openOutOfDriveViewControllerAction(
-        *resolved, viewController, [=] { *opened = services().appRegistry().openInPlace(*resolved, *app); });
+    DocumentListController::openOutOfDriveViewControllerAction(*resolved, viewController, [=] {
+        const auto sheet = DocumentInteractionSheet::interactionControllerWithURL(*resolved);
+        *opened = sheet->openDocumentInPlaceInApp(*app);
+    });
     return *opened;
 }
 

@@ -5,6 +5,7 @@
 #include "platform/CharacterData.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
+#include "platform/DocumentSharing.h"
 #include "platform/FileCoordinator.h"
 #include "platform/FileSystem.h"
 #include "platform/FolderLister.h"

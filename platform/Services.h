@@ -9,6 +9,7 @@ class AppRegistry;
 class CharacterData;
 class CloudDocumentService;
 class Dispatch;
+class DocumentSharing;
 class FileCoordinator;
 class FileSystem;
 class FolderLister;
@@ -31,6 +32,7 @@ struct ServiceSet {
     std::shared_ptr<CharacterData> characterData;
     std::shared_ptr<CloudDocumentService> cloudDocumentService;
     std::shared_ptr<Dispatch> dispatch;
+    std::shared_ptr<DocumentSharing> documentSharing;
     std::shared_ptr<FileCoordinator> fileCoordinator;
     std::shared_ptr<FileSystem> fileSystem;
     std::shared_ptr<FolderLister> folderLister;
@@ -60,6 +62,7 @@ public:
     CharacterData& characterData() const { return *_set.characterData; }
     CloudDocumentService& cloudDocumentService() const { return *_set.cloudDocumentService; }
     Dispatch& dispatch() const { return *_set.dispatch; }
+    DocumentSharing& documentSharing() const { return *_set.documentSharing; }
     FileCoordinator& fileCoordinator() const { return *_set.fileCoordinator; }
     FileSystem& fileSystem() const { return *_set.fileSystem; }
     FolderLister& folderLister() const { return *_set.folderLister; }

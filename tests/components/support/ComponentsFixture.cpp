@@ -71,7 +71,9 @@ std::vector<std::string> RecordingListDelegate::take()
 ComponentsFixture::ComponentsFixture()
 {
     coordinator = std::make_shared<CountingCoordinator>(_driveServices.fileCoordinator());
+    _set.appRegistry = apps;
     _set.cloudDocumentService = drive.cloud;
+    _set.documentSharing = sharing;
     _set.dispatch = drive.dispatch;
     _set.fileCoordinator = coordinator;
     _set.fileSystem = borrowed(_driveServices.fileSystem());

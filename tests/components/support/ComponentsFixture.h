@@ -6,7 +6,9 @@
 #include "platform/components/DocumentListController.h"
 #include "platform/components/DocumentListControllerDelegate.h"
 #include "tests/components/support/HandLister.h"
+#include "tests/components/support/RecordingSharing.h"
 #include "tests/support/DriveFixture.h"
+#include "tests/support/SimulatedApps.h"
 
 #include <gtest/gtest.h>
 
@@ -112,6 +114,8 @@ protected:
     DriveFixture drive;
     std::shared_ptr<HandLister> lister = std::make_shared<HandLister>();
     std::shared_ptr<RecordingLinks> links = std::make_shared<RecordingLinks>();
+    std::shared_ptr<RecordingSharing> sharing = std::make_shared<RecordingSharing>();
+    std::shared_ptr<SimulatedApps> apps = std::make_shared<SimulatedApps>();
     std::shared_ptr<CountingCoordinator> coordinator;
     std::shared_ptr<RecordingListDelegate> delegate = std::make_shared<RecordingListDelegate>();
 

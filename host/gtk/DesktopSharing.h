@@ -1,0 +1,38 @@
+#pragma once
+
+#include "platform/DocumentSharing.h"
+
+#include <memory>
+#include <optional>
+
+namespace platform {
+class OperationQueue;
+class TypeRegistry;
+} // namespace platform
+
+namespace host::gtk {
+
+enum class PrintableKind : int;
+
+/// The desktop's ways to hand on a document: its clipboard, the mail program of "mailto" through xdg-email,
+/// the file manager that answers org.freedesktop.FileManager1 (else the one that opens folders), and its
+/// print dialog.
+class DesktopSharing : public platform::DocumentSharing {
+public:
+    explicit DesktopSharing(std::shared_ptr<const platform::TypeRegistry> types);
+
+    void copyText(const std::string& text) override;
+    bool canSendByMail() const override;
+    void sendByMail(const platform::Url& document, Completion completion) override;
+    void showInFileManager(const platform::Url& item, Completion completion) override;
+    bool canPrint(const platform::Url& document) const override;
+    void print(const platform::Url& document, Completion completion) override;
+
+private:
+    std::optional<PrintableKind> printableKind(const platform::Url& document) const;
+
+    std::shared_ptr<const platform::TypeRegistry> _types;
+    std::shared_ptr<platform::OperationQueue> _queue; ///< made at the first printing
+};
+
+} // namespace host::gtk

@@ -1,0 +1,99 @@
+#pragma once
+
+#include "platform/AppRegistry.h"
+#include "platform/Error.h"
+#include "platform/Geometry.h"
+#include "platform/Url.h"
+#include "platform/ui/PopoverAnchor.h"
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace platform::ui {
+class AlertController;
+class BarButtonItem;
+class View;
+class ViewController;
+} // namespace platform::ui
+
+namespace platform::components {
+
+class DocumentInteractionSheet;
+
+/// Is told when the sheet has gone. Main thread only.
+class DocumentInteractionSheetDelegate {
+public:
+    virtual ~DocumentInteractionSheetDelegate() = default;
+    /// Called once after each menu that was shown, whatever was chosen in it.
+    virtual void documentInteractionControllerDidDismissOptionsMenu(
+        const std::shared_ptr<DocumentInteractionSheet>&)
+    {
+    }
+};
+
+/// What can be done with one item outside the drive: open it in an app, send it, copy its path or a link to
+/// it, show it in the file manager, print it. What needs the content is offered only where that is
+/// downloaded. Whoever shows the menu keeps the sheet until it is dismissed. Main thread only.
+class DocumentInteractionSheet : public std::enable_shared_from_this<DocumentInteractionSheet> {
+public:
+    /// Apps that have a line of their own in the menu; further ones stand behind a line "Other Apps…".
+    static constexpr std::size_t directApps = 3;
+
+    static std::shared_ptr<DocumentInteractionSheet> interactionControllerWithURL(const Url& url);
+    explicit DocumentInteractionSheet(Url url);
+
+    const Url& url() const { return _url; }
+    /// The heading of the menu; the item's display name until it is set.
+    const std::string& name() const { return _name; }
+    void setName(std::string name) { _name = std::move(name); }
+    void setDelegate(std::weak_ptr<DocumentInteractionSheetDelegate> delegate)
+    {
+        _delegate = std::move(delegate);
+    }
+
+    /// Has an app open the document where it lies. False when the content is not here or the app cannot be
+    /// started.
+    bool openDocumentInPlaceInApp(const AppHandle& app) const;
+
+    /// Shows the menu over a screen, pointing at a rectangle of a view.
+    void presentOptionsMenuFromRectInView(const std::shared_ptr<ui::ViewController>& presenter,
+        const Rect& rect, const std::shared_ptr<ui::View>& view, bool animated);
+    /// The same, pointing at a button of a bar.
+    void presentOptionsMenuFromBarButtonItem(const std::shared_ptr<ui::ViewController>& presenter,
+        const std::shared_ptr<ui::BarButtonItem>& item, bool animated);
+
+private:
+    using Apps = std::vector<AppHandle>;
+    using Action = void (DocumentInteractionSheet::*)();
+
+    void present(
+        const std::shared_ptr<ui::ViewController>& presenter, ui::PopoverAnchor anchor, bool animated);
+    std::shared_ptr<ui::AlertController> makeMenu(Apps apps);
+    std::shared_ptr<ui::AlertController> makeAppMenu(const Apps& apps);
+    void showMenu(const std::shared_ptr<ui::AlertController>& menu, bool animated);
+    void addApp(ui::AlertController& menu, const AppHandle& app);
+    void add(ui::AlertController& menu, const std::string& title, Action action);
+    void addCancel(ui::AlertController& menu);
+    bool contentIsHere() const;
+    std::function<void(const std::optional<Error>&)> reportFailure();
+
+    void openIn(const AppHandle& app);
+    void sendByMail();
+    void copyPath();
+    void copyLink();
+    void showInFileManager();
+    void print();
+    void showFailure(const std::string& title, const std::string& message);
+    void ended();
+
+    Url _url;
+    std::string _name;
+    std::weak_ptr<DocumentInteractionSheetDelegate> _delegate;
+    std::weak_ptr<ui::ViewController> _presenter;
+    ui::PopoverAnchor _anchor;
+};
+
+} // namespace platform::components

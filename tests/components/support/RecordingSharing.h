@@ -1,0 +1,41 @@
+#pragma once
+
+#include "platform/DocumentSharing.h"
+
+#include <string>
+#include <vector>
+
+namespace testing_support {
+
+/// Writes down what is handed to other programs; `answer` is what each of them answers at once.
+class RecordingSharing : public platform::DocumentSharing {
+public:
+    void copyText(const std::string& text) override { lines.push_back("copy " + text); }
+    bool canSendByMail() const override { return hasMailer; }
+    void sendByMail(const platform::Url& document, Completion completion) override
+    {
+        record("mail", document, completion);
+    }
+    void showInFileManager(const platform::Url& item, Completion completion) override
+    {
+        record("show", item, completion);
+    }
+    bool canPrint(const platform::Url& document) const override { return document.pathExtension() == "pdf"; }
+    void print(const platform::Url& document, Completion completion) override
+    {
+        record("print", document, completion);
+    }
+
+    bool hasMailer = true;
+    std::optional<platform::Error> answer;
+    std::vector<std::string> lines;
+
+private:
+    void record(const std::string& what, const platform::Url& url, const Completion& completion)
+    {
+        lines.push_back(what + " " + url.lastPathComponent());
+        completion(answer);
+    }
+};
+
+} // namespace testing_support
