@@ -1,9 +1,11 @@
 #pragma once
 
 #include "platform/Error.h"
+#include "platform/ItemDownload.h"
 #include "platform/Url.h"
 
 #include <functional>
+#include <memory>
 #include <string>
 
 namespace platform {
@@ -35,6 +37,10 @@ public:
     /// what no other device could open (it lies outside the drive's documents, or is not there).
     virtual void RZBookmarkableStringFromDocumentURL(
         const Url& url, std::function<void(Result<std::string>)> completion) const = 0;
+
+    /// Brings the content of a promised document here, in the background, and puts the document in the
+    /// promise's place. One that is here already is no error, and its handlers are called, too. Any thread.
+    virtual std::unique_ptr<ItemDownload> startDownload(const Url& url, DownloadHandlers handlers) = 0;
 
     /// Finds the document that a bookmark string from another device names. The completion is called once, on
     /// any thread, with the URL or the error (damaged, too large, unknown account or document).

@@ -10,6 +10,11 @@ namespace host::drive {
 /// `flags` are open(2)'s. On failure errno tells why: EXDEV for a way out, ELOOP for a link.
 host::system::FileDescriptor openBeneath(const std::string& root, const std::string& relativePath, int flags);
 
+/// Opens a folder by its name in an open one, for reading its names. Neither a link nor a mount is entered:
+/// on failure errno tells why (EBUSY for a mount).
+host::system::FileDescriptor openSubfolder(
+    const host::system::FileDescriptor& parent, const std::string& name);
+
 /// The path by which the kernel lets one name an open descriptor.
 std::string descriptorPath(const host::system::FileDescriptor& descriptor);
 

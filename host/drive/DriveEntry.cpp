@@ -61,6 +61,17 @@ int DriveEntry::find(std::string& physicalName, struct stat& result) const
     return ::fstatat(folder.get(), physicalName.c_str(), &result, AT_SYMLINK_NOFOLLOW) == 0 ? 0 : failure;
 }
 
+Result<LocatedItem> LocatedItem::locate(const DriveLayout& layout, const std::string& path)
+{
+    auto entry = DriveEntry::open(layout, path);
+    if (!entry)
+        return *entry.error;
+    LocatedItem item{std::move(*entry.value), {}, {}};
+    if (const int failure = item.entry.find(item.name, item.found); failure != 0)
+        return itemError(failure, path);
+    return item;
+}
+
 ItemVersion versionOf(const struct stat& status)
 {
     return {status.st_dev, status.st_ino, static_cast<std::uint64_t>(status.st_size),

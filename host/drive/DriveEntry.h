@@ -30,6 +30,17 @@ struct DriveEntry {
     int find(std::string& physicalName, struct stat& result) const;
 };
 
+/// An item that was found: the name on disk that stands for it, and what that was.
+struct LocatedItem {
+    DriveEntry entry;
+    std::string name;
+    struct stat found { };
+
+    /// Errors: as DriveEntry::open(), and FileErrorCode::NoSuchItem where neither item nor promise lies.
+    static platform::Result<LocatedItem> locate(const DriveLayout& layout, const std::string& path);
+    bool isPromise() const { return name != entry.name; }
+};
+
 platform::ItemVersion versionOf(const struct stat& status);
 /// Whether both are one item of one content; a rename in between changes no more than the time of change.
 bool isSameContent(const platform::ItemVersion& a, const platform::ItemVersion& b);

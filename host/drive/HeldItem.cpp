@@ -1,14 +1,13 @@
 #include "host/drive/HeldItem.h"
 
+#include "host/drive/Discarding.h"
+#include "host/drive/PromiseRecord.h"
 #include "host/drive/SmallFile.h"
-#include "host/drive/TreeWalk.h"
-#include "host/system/DirectoryReader.h"
 #include "platform/Log.h"
 
 #include <fcntl.h>
 
 #include <cerrno>
-#include <memory>
 
 namespace host::drive {
 
@@ -16,41 +15,19 @@ using host::system::FileDescriptor;
 
 namespace {
 
-constexpr std::string_view recordSuffix = ".place";
-constexpr std::size_t largestRecord = 16 * 1024; // two paths
-
-bool lockWhole(const FileDescriptor& file)
-{
-    struct flock lock { };
-    lock.l_type = F_WRLCK;
-    lock.l_whence = SEEK_SET;
-    return ::fcntl(file.get(), F_OFD_SETLK, &lock) == 0;
-}
-
 bool isOnOneFileSystem(const FileDescriptor& a, const FileDescriptor& b)
 {
     struct stat first, second;
     return ::fstat(a.get(), &first) == 0 && ::fstat(b.get(), &second) == 0 && first.st_dev == second.st_dev;
 }
 
-/// Puts one item back by its record: where it was and, after a NUL, where it is.
-int restore(const DriveLayout& layout, const std::string& record)
+/// A promise is known by its name, held or not.
+std::string heldName(const std::string& name)
 {
-    const auto end = record.find('\0');
-    if (end == std::string::npos)
-        return 0; // killed while it was written: nothing had been taken yet
-    const auto origin = DriveEntry::open(layout, record.substr(0, end));
-    const auto now = record.substr(end + 1);
-    struct stat found;
-    if (::lstat(now.c_str(), &found) != 0)
-        return 0;
-    if (!origin)
-        return ENOENT;
-    const auto name = now.substr(now.rfind('/') + 1);
-    if (now == layout.held() + '/' + name)
-        return renameEntry(openOwnFolder(layout.held()), name, origin->folder, origin->name);
-    const auto beside = DriveEntry::open(layout, now);
-    return beside ? renameEntry(beside->folder, name, origin->folder, origin->name) : ENOENT;
+    auto held = uniqueName(WorkRecord::heldPrefix);
+    if (PromiseRecord::itemPathFor(name))
+        held += PromiseRecord::suffix;
+    return held;
 }
 
 } // namespace
@@ -63,21 +40,18 @@ HeldItem::HeldItem(HeldItem&& other) noexcept
     , _name(std::move(other._name))
     , _path(std::move(other._path))
     , _isAside(other._isAside)
-    , _recordPath(std::move(other._recordPath))
     , _isThere(std::exchange(other._isThere, false))
 {
-    other._recordPath.clear();
 }
 
 HeldItem::~HeldItem()
 {
     if (_isThere)
         putBack();
-    forget();
 }
 
 int HeldItem::take(const DriveLayout& layout, const DriveEntry& entry, const std::string& name,
-    std::optional<HeldItem>& held)
+    std::optional<HeldItem>& held, const std::string& copy)
 {
     HeldItem item;
     item._aside = openOwnFolder(layout.held());
@@ -87,8 +61,11 @@ int HeldItem::take(const DriveLayout& layout, const DriveEntry& entry, const std
     item._isAside = isOnOneFileSystem(item._aside, item._origin);
     item._originName = name;
     item._path = entry.path;
-    item._name = uniqueName(".trwheld-");
-    if (const int failure = item.writeRecord(layout); failure != 0)
+    item._name = heldName(name);
+    const auto origin = entry.path.substr(0, entry.path.rfind('/') + 1);
+    const auto working = (item._isAside ? layout.held() + '/' : origin) + item._name;
+    if (const int failure = WorkRecord::write(layout, {origin + name, working, copy}, item._record);
+        failure != 0)
         return failure;
     if (const int failure = renameEntry(item._origin, name, item.folder(), item._name); failure != 0)
         return failure;
@@ -97,69 +74,50 @@ int HeldItem::take(const DriveLayout& layout, const DriveEntry& entry, const std
     return 0;
 }
 
-int HeldItem::writeRecord(const DriveLayout& layout)
+int HeldItem::decide(const char* prefix)
 {
-    const auto originFolder = _path.substr(0, _path.rfind('/') + 1);
-    const auto record =
-        originFolder + _originName + '\0' + (_isAside ? layout.held() + '/' : originFolder) + _name;
-    _recordPath = layout.held() + '/' + _name + std::string(recordSuffix);
-    _record = FileDescriptor(::open(_recordPath.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0600));
-    if (_record && !lockWhole(_record))
-        return errno;
-    const auto written = _record ? ::write(_record.get(), record.data(), record.size()) : -1;
-    // On a full disk something must be removable still: it is then held without a record.
-    if (written >= 0 || errno == ENOSPC || errno == EDQUOT)
-        return 0;
-    return errno;
+    auto decided = prefix + _name.substr(std::string_view(WorkRecord::heldPrefix).size());
+    if (const int failure = renameEntry(folder(), _name, folder(), decided); failure != 0)
+        return failure;
+    _name = std::move(decided);
+    return syncFolder(_origin);
 }
 
-int HeldItem::remove()
+int HeldItem::remove(CloudStore* store)
 {
-    const int failure = removeTree(folder(), _name);
-    _isThere = failure != 0;
-    if (failure != 0)
+    static constexpr platform::Operation op{"-[HeldItem remove]"};
+    int failure = checkRemovable(folder(), _name);
+    if (failure == 0)
+        failure = decide(store ? WorkRecord::gonePrefix : WorkRecord::movedPrefix);
+    const auto discarded = failure == 0 ? discardTree(folder(), _name, store, failure) : Discarded::Nothing;
+    if (discarded == Discarded::Nothing) {
         putBack();
-    return failure;
+        return failure;
+    }
+    _isThere = false;
+    if (discarded == Discarded::Something) {
+        op.warning("Not all of %@ could be removed yet: %@", _path, itemError(failure, _path));
+        _record->keep();
+    }
+    return 0;
 }
 
 void HeldItem::putBack()
 {
     static constexpr platform::Operation op{"-[HeldItem putBack]"};
     _isThere = false;
-    if (const int failure = renameEntry(folder(), _name, _origin, _originName); failure != 0) {
-        // Someone saved a new one meanwhile, or the folder is gone: both are kept.
-        op.warning("Cannot put back %@, kept as %@: %@", _path, _name, itemError(failure, _path));
-        _recordPath.clear();
-    }
-}
-
-void HeldItem::forget()
-{
-    if (!_recordPath.empty())
-        ::unlink(_recordPath.c_str());
-}
-
-void HeldItem::restoreAll(const DriveLayout& layout)
-{
-    static constexpr platform::Operation op{"+[HeldItem restoreAll]"};
-    const auto folder = host::system::openFolder(layout.held());
-    if (!folder)
+    const int failure = renameEntry(folder(), _name, _origin, _originName);
+    if (failure == 0)
         return;
-    const auto reader = std::make_unique<host::system::DirectoryReader>(folder);
-    while (const auto entry = reader->next()) {
-        if (!entry->name.ends_with(recordSuffix))
-            continue;
-        const auto path = layout.held() + '/' + std::string(entry->name);
-        const FileDescriptor file(::open(path.c_str(), O_RDWR | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC));
-        if (!file || !lockWhole(file))
-            continue; // its process still works on it
-        const auto record = readSmallFile(file, path, largestRecord);
-        const int failure = record ? restore(layout, *record) : 0;
-        if (failure == 0)
-            ::unlink(path.c_str());
-        else
-            op.warning("Cannot put back what %@ names: %@", path, itemError(failure, path));
+    // Someone saved a new one meanwhile, or the folder is gone: both are kept. Under a name that says that
+    // it is to be removed it would not be.
+    if (!_name.starts_with(WorkRecord::heldPrefix)) {
+        auto undecided = WorkRecord::heldPrefix + _name.substr(_name.find('-') + 1);
+        if (renameEntry(folder(), _name, folder(), undecided) == 0)
+            _name = std::move(undecided);
     }
+    op.warning("Cannot put back %@, kept as %@: %@", _path, _name, itemError(failure, _path));
+    _record->keep();
 }
 
 } // namespace host::drive

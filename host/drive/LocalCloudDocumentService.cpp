@@ -1,6 +1,7 @@
 #include "host/drive/LocalCloudDocumentService.h"
 
-#include "host/drive/HeldItem.h"
+#include "host/drive/LocalCloudStore.h"
+#include "host/drive/Recovery.h"
 
 namespace host::drive {
 
@@ -15,18 +16,19 @@ LocalCloudDocumentService::LocalCloudDocumentService(
     const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings)
     : _layout(layout)
     , _account(layout)
-    , _containers(std::make_shared<LocalContainers>(layout, settings.languages))
+    , _store(std::make_shared<LocalCloudStore>(layout))
+    , _itemChanges(std::make_shared<LocalItemChanges>(layout, _store))
+    , _containers(std::make_shared<LocalContainers>(layout, settings.languages, _itemChanges))
     , _promisedItems(layout,
           ItemAttributes(dependencies.typeRegistry, _containers, dependencies.localization,
               layout.defaultContainerURL()),
           ThumbnailCache::create(settings.thumbnailFolder, dependencies.dispatch))
-    , _items(layout, dependencies.dispatch)
-    , _itemChanges(std::make_shared<LocalItemChanges>(layout))
+    , _items(layout, _itemChanges, _store, dependencies.dispatch)
     , _storageOffers(LocalStorageOfferManager::create(layout, dependencies))
     , _keyValueStore(LocalKeyValueStore::create(layout, dependencies))
     , _monitor(AccountMonitor::start(layout, dependencies))
 {
-    HeldItem::restoreAll(layout);
+    Recovery(layout, *_store).run();
     _monitor->onFileChanged([weak = std::weak_ptr(_storageOffers)] {
         if (const auto offers = weak.lock())
             offers->accountFileChanged();

@@ -51,10 +51,11 @@ private:
 
     DriveLayout _layout;
     LocalAccount _account;
+    std::shared_ptr<CloudStore> _store;
+    std::shared_ptr<LocalItemChanges> _itemChanges;
     std::shared_ptr<LocalContainers> _containers;
     LocalPromisedItems _promisedItems;
     LocalCloudItems _items;
-    std::shared_ptr<LocalItemChanges> _itemChanges;
     std::shared_ptr<LocalStorageOfferManager> _storageOffers;
     std::shared_ptr<LocalKeyValueStore> _keyValueStore;
     std::shared_ptr<AccountMonitor> _monitor;

@@ -90,8 +90,14 @@ Result<Url> findBookmarked(const DriveLayout& layout, const DocumentIndex& index
 
 } // namespace
 
-LocalCloudItems::LocalCloudItems(DriveLayout layout, const std::shared_ptr<platform::Dispatch>& dispatch)
+LocalCloudItems::LocalCloudItems(DriveLayout layout, std::shared_ptr<LocalItemChanges> changes,
+    std::shared_ptr<CloudStore> store, const std::shared_ptr<platform::Dispatch>& dispatch)
     : _layout(std::move(layout))
+    , _changes(std::move(changes))
+    , _downloads{_layout, std::move(store),
+          dispatch->makeOperationQueue(
+              "TarrowDriveAppID.downloads", platform::QualityOfService::UserInitiated),
+          dispatch->mainQueue()}
     , _index(std::make_shared<DocumentIndex>(_layout.index()))
     , _queue(dispatch->makeSerialQueue("TarrowDriveAppID.bookmarks"))
 {
@@ -115,7 +121,13 @@ Url LocalCloudItems::realURL(const Url& url) const
 
 std::optional<Error> LocalCloudItems::evictItem(const Url& url)
 {
-    return LocalItemChanges(_layout).evictItem(url.path());
+    return _changes->evictItem(url.path());
+}
+
+std::unique_ptr<platform::ItemDownload> LocalCloudItems::startDownload(
+    const Url& url, platform::DownloadHandlers handlers)
+{
+    return LocalDownload::start(_downloads, url.path(), std::move(handlers));
 }
 
 std::optional<Url> LocalCloudItems::documentWithIdentifier(std::uint32_t identifier) const

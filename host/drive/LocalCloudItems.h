@@ -2,17 +2,20 @@
 
 #include "host/drive/DocumentIndex.h"
 #include "host/drive/DriveLayout.h"
+#include "host/drive/LocalDownload.h"
 #include "platform/CloudItems.h"
 #include "platform/Dispatch.h"
 
 namespace host::drive {
 
 struct Bookmark;
+class LocalItemChanges;
 
 /// Where items of the local store lie.
 class LocalCloudItems : public platform::CloudItems {
 public:
-    LocalCloudItems(DriveLayout layout, const std::shared_ptr<platform::Dispatch>& dispatch);
+    LocalCloudItems(DriveLayout layout, std::shared_ptr<LocalItemChanges> changes,
+        std::shared_ptr<CloudStore> store, const std::shared_ptr<platform::Dispatch>& dispatch);
 
     bool isInDocumentsArea(const platform::Url& url) const override;
     bool isInTrash(const platform::Url& url) const override;
@@ -20,12 +23,16 @@ public:
     std::optional<platform::Error> evictItem(const platform::Url& url) override;
     void RZBookmarkableStringFromDocumentURL(const platform::Url& url,
         std::function<void(platform::Result<std::string>)> completion) const override;
+    std::unique_ptr<platform::ItemDownload> startDownload(
+        const platform::Url& url, platform::DownloadHandlers handlers) override;
     void decodeBookmark(const std::string& bookmark,
         std::function<void(platform::Result<platform::Url>)> completion) const override;
     std::optional<platform::Url> documentWithIdentifier(std::uint32_t identifier) const override;
 
 private:
     DriveLayout _layout;
+    std::shared_ptr<LocalItemChanges> _changes;
+    LocalDownload::Setting _downloads;
     std::shared_ptr<DocumentIndex> _index;
     std::shared_ptr<platform::Queue> _queue;
 };

@@ -1,6 +1,5 @@
 #include "host/drive/LocalContainers.h"
 
-#include "host/drive/LocalItemChanges.h"
 #include "host/drive/SmallFile.h"
 #include "host/system/DirectoryReader.h"
 #include "platform/Log.h"
@@ -41,9 +40,11 @@ std::string sortKey(const std::string& name)
 
 } // namespace
 
-LocalContainers::LocalContainers(DriveLayout layout, std::vector<std::string> languages)
+LocalContainers::LocalContainers(DriveLayout layout, std::vector<std::string> languages,
+    std::shared_ptr<host::system::ItemChanges> changes)
     : _layout(std::move(layout))
     , _languages(std::move(languages))
+    , _changes(std::move(changes))
 {
 }
 
@@ -127,7 +128,7 @@ std::optional<platform::Error> LocalContainers::deleteContents(const DocumentCon
     if (container.identifier == DriveLayout::defaultContainerIdentifier)
         return platform::Error(platform::FileErrorCode::Unsupported);
     // Its description stays: an app that makes documents again finds its library as it was.
-    return LocalItemChanges(_layout).removeItem(_layout.container(container.identifier), std::nullopt);
+    return _changes->removeItem(_layout.container(container.identifier), std::nullopt);
 }
 
 std::vector<ContainerPointer> LocalContainers::allContainers() const

@@ -2,6 +2,7 @@
 
 #include "host/drive/ContainerRecord.h"
 #include "host/drive/DriveLayout.h"
+#include "host/system/ItemChanges.h"
 #include "platform/DocumentContainers.h"
 
 #include <map>
@@ -16,7 +17,8 @@ namespace host::drive {
 class LocalContainers : public platform::DocumentContainers {
 public:
     /// `languages`: the user's, the preferred one first ("de_DE", "de", ...).
-    LocalContainers(DriveLayout layout, std::vector<std::string> languages);
+    LocalContainers(DriveLayout layout, std::vector<std::string> languages,
+        std::shared_ptr<host::system::ItemChanges> changes);
 
     std::string defaultContainerIdentifier() const override;
     std::optional<platform::Url> defaultContainerURL() const override;
@@ -53,6 +55,7 @@ private:
 
     DriveLayout _layout;
     std::vector<std::string> _languages;
+    std::shared_ptr<host::system::ItemChanges> _changes;
     mutable std::mutex _mutex;
     mutable std::map<std::string, Known> _known;
 };

@@ -3,10 +3,10 @@
 #include "host/drive/BeneathRoot.h"
 #include "host/drive/HeldItem.h"
 #include "host/drive/ItemFacts.h"
-#include "host/drive/PromiseRecord.h"
+#include "host/drive/NewFile.h"
+#include "host/drive/PromiseFile.h"
 #include "host/drive/SmallFile.h"
-#include "host/drive/TreeWalk.h"
-#include "host/system/AtomicWrite.h"
+#include "host/drive/TreeCopy.h"
 #include "host/system/SystemErrors.h"
 #include "host/system/Translate.h"
 
@@ -23,12 +23,6 @@ using platform::FileErrorCode;
 using platform::ItemVersion;
 
 namespace {
-
-bool isPlainName(const std::string& name)
-{
-    return !name.empty() && name != "." && name != ".."
-        && name.find_first_of(std::string_view("/\0", 2)) == std::string::npos;
-}
 
 /// Whether an item or a promise has the name already; answers 0 when none has, EEXIST, or another errno.
 int checkIsFree(const DriveEntry& entry)
@@ -58,26 +52,20 @@ PromiseRecord promiseFor(const ItemFacts& facts, const std::string& content)
     return promise;
 }
 
-/// What "changed meanwhile" is called between the steps below; no step of theirs fails with it otherwise.
+/// What two refusals are called between the steps below; no step of theirs fails with them otherwise.
 constexpr int changedMeanwhile = ECANCELED;
+constexpr int ownFolder = EDEADLK;
+
+/// Whether an open folder is one of a tree's, by whatever name it was reached: a mount can give it another.
+bool holdsFolder(const TreeVersions& tree, const FileDescriptor& folder)
+{
+    struct stat found;
+    return ::fstat(folder.get(), &found) == 0 && tree.contains({found.st_dev, found.st_ino});
+}
 
 Error changeError(int errorNumber, const std::string& path)
 {
     return errorNumber == changedMeanwhile ? Error(FileErrorCode::Cancelled) : itemError(errorNumber, path);
-}
-
-/// Answers 0, changedMeanwhile when another version had to be put back, or another errno.
-int moveToCloud(const DriveEntry& entry, const ItemVersion& version, const FileDescriptor& cloud,
-    const std::string& content)
-{
-    struct stat moved;
-    if (const int failure = renameEntry(entry.folder, entry.name, cloud, content); failure != 0)
-        return failure;
-    if (::fstatat(cloud.get(), content.c_str(), &moved, AT_SYMLINK_NOFOLLOW) == 0
-        && isSameContent(version, versionOf(moved)))
-        return 0;
-    const int failure = renameEntry(cloud, content, entry.folder, entry.name);
-    return failure == 0 ? changedMeanwhile : failure;
 }
 
 Error intoItself(const std::string& from, const std::string& to)
@@ -94,12 +82,8 @@ Error intoItself(const std::string& from, const std::string& to)
 
 std::optional<ItemVersion> LocalItemChanges::versionOfItem(const std::string& path) const
 {
-    const auto entry = DriveEntry::open(_layout, path);
-    std::string name;
-    struct stat found;
-    if (!entry || entry->find(name, found) != 0)
-        return std::nullopt;
-    return versionOf(found);
+    const auto item = LocatedItem::locate(_layout, path);
+    return item ? std::optional(versionOf(item->found)) : std::nullopt;
 }
 
 std::optional<Error> LocalItemChanges::createFolder(const std::string& path)
@@ -128,76 +112,56 @@ std::optional<Error> LocalItemChanges::createFolder(const std::string& path)
 std::optional<Error> LocalItemChanges::removeItem(
     const std::string& path, const std::optional<ItemVersion>& unchangedSince)
 {
-    const auto entry = DriveEntry::open(_layout, path);
-    if (!entry)
-        return entry.error;
-    std::string name;
-    struct stat found;
-    if (const int failure = entry->find(name, found); failure != 0)
-        return itemError(failure, path);
-    if (unchangedSince && versionOf(found) != *unchangedSince)
+    const auto item = LocatedItem::locate(_layout, path);
+    if (!item)
+        return item.error;
+    if (unchangedSince && versionOf(item->found) != *unchangedSince)
         return Error(FileErrorCode::Cancelled);
-    const auto content = cloudContent(*entry);
-    if (const int failure = removeHeld(*entry, name, versionOf(found)); failure != 0)
-        return changeError(failure, path);
-    removePromise(*entry, content);
-    const int failure = syncFolder(entry->folder);
-    return failure == 0 ? std::nullopt : std::optional(itemError(failure, path));
+    if (!item->isPromise())
+        dropRedundantPromise(item->entry, *_store);
+    const int failure = removeLocated(*item);
+    return failure == 0 ? std::nullopt : std::optional(changeError(failure, path));
 }
 
-int LocalItemChanges::removeHeld(const DriveEntry& entry, const std::string& name, const ItemVersion& version)
+int LocalItemChanges::removeLocated(const LocatedItem& item)
 {
-    std::optional<HeldItem> held;
-    if (const int failure = HeldItem::take(_layout, entry, name, held); failure != 0)
+    TreeVersions before, after;
+    if (const int failure = readVersions(item.entry.folder, item.name, before); failure != 0)
         return failure;
-    struct stat found;
-    if (::fstatat(held->folder().get(), held->name().c_str(), &found, AT_SYMLINK_NOFOLLOW) != 0)
-        return errno;
-    return isSameContent(version, versionOf(found)) ? held->remove() : changedMeanwhile;
-}
-
-std::string LocalItemChanges::cloudContent(const DriveEntry& entry) const
-{
-    const auto text = host::system::readWholeFile(
-        entry.folder, entry.promiseName(), PromiseRecord::maximumFileSize, entry.path);
-    const auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
-    return promise && isPlainName(promise->content) ? promise->content : std::string();
-}
-
-void LocalItemChanges::removePromise(const DriveEntry& entry, const std::string& content)
-{
-    // Left behind, it would make the item that was just removed show again.
-    ::unlinkat(entry.folder.get(), entry.promiseName().c_str(), 0);
-    if (!content.empty()) {
-        const FileDescriptor cloud(::open(_layout.cloud().c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
-        ::unlinkat(cloud.get(), content.c_str(), 0);
-    }
+    std::optional<HeldItem> held;
+    int failure = HeldItem::take(_layout, item.entry, item.name, held);
+    if (failure == 0)
+        failure = readVersions(held->folder(), held->name(), after);
+    if (failure != 0)
+        return failure;
+    const auto version = versionOf(item.found);
+    const auto same = after.find({version.device, version.inode});
+    const bool isUnchanged = before == after && same != after.end() && isSameContent(version, same->second);
+    return isUnchanged ? held->remove(_store.get()) : changedMeanwhile;
 }
 
 std::optional<Error> LocalItemChanges::moveItem(const std::string& from, const std::string& to)
 {
-    const auto source = DriveEntry::open(_layout, from);
+    const auto source = LocatedItem::locate(_layout, from);
     const auto target = DriveEntry::open(_layout, to);
     if (!source || !target)
         return source ? target.error : source.error;
-    std::string name;
-    struct stat found;
-    if (const int failure = source->find(name, found); failure != 0)
-        return itemError(failure, from);
     if (to.starts_with(from + '/'))
         return intoItself(from, to);
     if (const int failure = checkIsFree(*target); failure != 0)
         return systemError(failure, from, to);
-    const bool isPromise = name != source->name;
-    const auto newName = isPromise ? target->promiseName() : target->name;
-    int failure = renameEntry(source->folder, name, target->folder, newName);
+    if (!source->isPromise())
+        dropRedundantPromise(source->entry, *_store);
+    const auto newName = source->isPromise() ? target->promiseName() : target->name;
+    int failure = renameEntry(source->entry.folder, source->name, target->folder, newName);
     if (failure == EXDEV)
-        failure = moveAcross(*source, name, *target, newName);
+        failure = moveAcross(*source, *target, newName);
+    // To the kernel it is an invalid argument when the one name leads through the other by a mount.
+    if (failure == ownFolder || failure == EINVAL)
+        return intoItself(from, to);
     if (failure != 0)
         return failure == changedMeanwhile ? changeError(failure, from) : systemError(failure, from, to);
-    if (!isPromise)
-        renameEntry(source->folder, source->promiseName(), target->folder, target->promiseName());
-    for (const auto* entry : {&*target, &*source}) {
+    for (const auto* entry : {&*target, &source->entry}) {
         if (failure = syncFolder(entry->folder); failure != 0)
             return itemError(failure, entry->path);
     }
@@ -205,64 +169,92 @@ std::optional<Error> LocalItemChanges::moveItem(const std::string& from, const s
 }
 
 int LocalItemChanges::moveAcross(
-    const DriveEntry& source, const std::string& name, const DriveEntry& target, const std::string& newName)
+    const LocatedItem& source, const DriveEntry& target, const std::string& newName)
 {
-    const auto temporary = uniqueName(".trwtmp-");
-    TreeVersions before, after;
-    int failure = readVersions(source.folder, name, before);
+    TreeVersions before;
+    if (const int failure = readVersions(source.entry.folder, source.name, before); failure != 0)
+        return failure;
+    if (holdsFolder(before, target.folder))
+        return ownFolder;
+    const auto temporary = uniqueName(WorkRecord::temporaryPrefix);
+    const auto folder = target.path.substr(0, target.path.rfind('/') + 1);
+    const auto item = source.entry.path.substr(0, source.entry.path.rfind('/') + 1) + source.name;
+    std::optional<WorkRecord> record;
+    TreeVersions copied;
+    int failure = WorkRecord::write(_layout, {item, folder + temporary, folder + newName}, record);
     if (failure == 0)
-        failure = copyTree(source.folder, name, target.folder, temporary);
+        failure = copyTree(source.entry.folder, source.name, target.folder, temporary);
+    if (failure == 0)
+        failure = readVersions(target.folder, temporary, copied);
     if (failure == 0)
         failure = renameEntry(target.folder, temporary, target.folder, newName);
     if (failure != 0) {
         removeTree(target.folder, temporary);
         return failure;
     }
-    if (failure = syncFolder(target.folder); failure != 0)
-        return failure;
     // From here on the copy is whole and has its name: the worst that can be is that both are there.
+    failure = syncFolder(target.folder);
+    if (failure == 0)
+        failure = removeMoved(source, before, folder + newName);
+    if (failure != 0)
+        withdraw(target, newName, copied);
+    return failure;
+}
+
+void LocalItemChanges::withdraw(const DriveEntry& target, const std::string& name, const TreeVersions& copied)
+{
+    // The original is there still. A copy that somebody has changed by now is more than a copy.
+    TreeVersions found;
     std::optional<HeldItem> held;
-    failure = HeldItem::take(_layout, source, name, held);
+    if (HeldItem::take(_layout, target, name, held) == 0
+        && readVersions(held->folder(), held->name(), found) == 0 && found == copied)
+        held->remove(nullptr);
+}
+
+int LocalItemChanges::removeMoved(
+    const LocatedItem& source, const TreeVersions& before, const std::string& copy)
+{
+    TreeVersions after;
+    std::optional<HeldItem> held;
+    int failure = HeldItem::take(_layout, source.entry, source.name, held, copy);
     if (failure == 0)
         failure = readVersions(held->folder(), held->name(), after);
     if (failure == 0)
-        failure = before == after ? held->remove() : changedMeanwhile;
+        failure = before == after ? held->remove(nullptr) : changedMeanwhile;
     return failure;
 }
 
 std::optional<Error> LocalItemChanges::evictItem(const std::string& path)
 {
-    const auto entry = DriveEntry::open(_layout, path);
-    if (!entry)
-        return entry.error;
-    std::string name;
-    struct stat found;
-    if (const int failure = entry->find(name, found); failure != 0)
-        return itemError(failure, path);
-    if (name != entry->name)
-        return std::nullopt;
-    if (!S_ISREG(found.st_mode))
+    const auto item = LocatedItem::locate(_layout, path);
+    if (!item || item->isPromise())
+        return item.error;
+    if (!S_ISREG(item->found.st_mode))
         return Error(FileErrorCode::Unsupported);
-    return replaceByPromise(*entry, found);
+    dropRedundantPromise(item->entry, *_store);
+    const int failure = replaceByPromise(*item);
+    return failure == 0 ? std::nullopt : std::optional(changeError(failure, path));
 }
 
-std::optional<Error> LocalItemChanges::replaceByPromise(const DriveEntry& entry, const struct stat& status)
+int LocalItemChanges::replaceByPromise(const LocatedItem& item)
 {
-    const auto cloud = openOwnFolder(_layout.cloud());
-    if (!cloud)
-        return itemError(errno, _layout.cloud());
+    const auto& entry = item.entry;
     const auto content = uniqueName("content-");
     const auto promise = promiseFor(lookAtFile(descriptorPath(entry.folder) + '/' + entry.name), content);
+    std::optional<NewFile> file;
+    int failure = NewFile::create(_layout, entry, file);
+    if (failure == 0)
+        failure = file->write(promise.toJson());
     // While both are there the document counts; it goes only when its promise is safe on the disk.
-    if (auto error = host::system::writeFileAtomically(
-            entry.folder, entry.promiseName(), promise.toJson(), entry.path))
-        return error;
-    int failure = moveToCloud(entry, versionOf(status), cloud, content);
+    if (failure == 0)
+        failure = file->publish(entry, entry.promiseName());
     if (failure != 0)
-        ::unlinkat(entry.folder.get(), entry.promiseName().c_str(), 0);
-    else if (failure = syncFolder(cloud); failure == 0)
-        failure = syncFolder(entry.folder);
-    return failure == 0 ? std::nullopt : std::optional(changeError(failure, entry.path));
+        return failure;
+    failure = _store->store(entry, versionOf(item.found), content);
+    struct stat found;
+    if (failure != 0 && entry.status(found) == 0)
+        dropRedundantPromise(entry, *_store);
+    return failure == 0 ? syncFolder(entry.folder) : failure;
 }
 
 } // namespace host::drive

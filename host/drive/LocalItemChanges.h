@@ -1,17 +1,24 @@
 #pragma once
 
 #include "host/drive/DriveEntry.h"
+#include "host/drive/TreeWalk.h"
 #include "host/system/ItemChanges.h"
+
+#include <memory>
 
 namespace host::drive {
 
+class CloudStore;
+
 /// Changes of the drive's items, here or promised. Every step is taken by name in an open folder beneath the
-/// documents area; no link is followed and nothing is replaced. Where an item and its promise lie side by
-/// side the item counts, and the promise goes with it.
+/// documents area; no link is followed, nothing that is mounted in a folder is entered, and nothing is
+/// replaced. Where a document and a promise lie side by side the document counts: a promise that adds nothing
+/// goes with it, one with another content behind it stays and shows again.
 class LocalItemChanges : public host::system::ItemChanges {
 public:
-    explicit LocalItemChanges(DriveLayout layout)
+    LocalItemChanges(DriveLayout layout, std::shared_ptr<CloudStore> store)
         : _layout(std::move(layout))
+        , _store(std::move(store))
     {
     }
 
@@ -21,19 +28,20 @@ public:
         const std::string& path, const std::optional<platform::ItemVersion>& unchangedSince) override;
     std::optional<platform::Error> moveItem(const std::string& from, const std::string& to) override;
 
-    /// Moves the content of a downloaded document to the cloud's folder and leaves a promise. One that is
-    /// promised already is no error; folders cannot be evicted (FileErrorCode::Unsupported).
+    /// Hands the content of a downloaded document over to the store and leaves a promise. One that is
+    /// promised already is no error; folders cannot be evicted (FileErrorCode::Unsupported), nor a document
+    /// beside a promise of another content (FileErrorCode::ItemExists).
     std::optional<platform::Error> evictItem(const std::string& path);
 
 private:
-    int removeHeld(const DriveEntry& entry, const std::string& name, const platform::ItemVersion& version);
-    int moveAcross(const DriveEntry& source, const std::string& name, const DriveEntry& target,
-        const std::string& newName);
-    std::optional<platform::Error> replaceByPromise(const DriveEntry& entry, const struct stat& status);
-    void removePromise(const DriveEntry& entry, const std::string& cloudContent);
-    std::string cloudContent(const DriveEntry& entry) const;
+    int removeLocated(const LocatedItem& item);
+    int moveAcross(const LocatedItem& source, const DriveEntry& target, const std::string& newName);
+    int removeMoved(const LocatedItem& source, const TreeVersions& before, const std::string& copy);
+    void withdraw(const DriveEntry& target, const std::string& name, const TreeVersions& copied);
+    int replaceByPromise(const LocatedItem& item);
 
     DriveLayout _layout;
+    std::shared_ptr<CloudStore> _store;
 };
 
 } // namespace host::drive

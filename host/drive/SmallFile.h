@@ -28,6 +28,7 @@ enum class CloudErrorCode : int {
     UnknownContainer,
     UnusableBookmark,
     NotBookmarkable = platform::notBookmarkableCode,
+    MissingContent
 };
 
 /// A record of the drive that cannot be used: the cloud domain, with a sentence for the user and, as the

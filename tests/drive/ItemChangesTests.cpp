@@ -1,5 +1,7 @@
 #include "host/drive/HeldItem.h"
+#include "host/drive/LocalCloudStore.h"
 #include "host/drive/LocalItemChanges.h"
+#include "host/drive/Recovery.h"
 #include "tests/support/DriveFixture.h"
 
 #include <gmock/gmock.h>
@@ -28,7 +30,15 @@ using platform::Url;
 
 class ItemChangesTest : public testing::Test, public testing_support::DriveFixture {
 protected:
-    LocalItemChanges changes() const { return LocalItemChanges(layout()); }
+    LocalItemChanges changes() const
+    {
+        return {layout(), std::make_shared<host::drive::LocalCloudStore>(layout())};
+    }
+    void recover() const
+    {
+        host::drive::LocalCloudStore store(layout());
+        host::drive::Recovery(layout(), store).run();
+    }
     static std::string contentOf(const std::string& path)
     {
         std::ifstream file(path);
@@ -110,7 +120,7 @@ TEST_F(ItemChangesTest, AHeldItemComesBackUnlessANewerOneTookItsPlace)
     {
         const auto held = take(url);
         EXPECT_FALSE(fs::exists(url.path()));
-        HeldItem::restoreAll(layout());
+        recover();
         EXPECT_FALSE(fs::exists(url.path())) << "it is still being worked on";
     }
     EXPECT_EQ(contentOf(url.path()), "old");
@@ -121,7 +131,7 @@ TEST_F(ItemChangesTest, AHeldItemComesBackUnlessANewerOneTookItsPlace)
     }
     EXPECT_EQ(contentOf(url.path()), "new");
     fs::remove(url.path());
-    HeldItem::restoreAll(layout());
+    recover();
     EXPECT_EQ(contentOf(url.path()), "old") << "both were kept";
 }
 
@@ -135,7 +145,7 @@ TEST_F(ItemChangesTest, TheNextStartPutsBackWhatAKilledProcessHeld)
     }
     ::waitpid(child, nullptr, 0);
     EXPECT_FALSE(fs::exists(url.path()));
-    HeldItem::restoreAll(layout());
+    recover();
     EXPECT_EQ(contentOf(url.path()), "old");
     EXPECT_EQ(heldCount(), 0U);
 }

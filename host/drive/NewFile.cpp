@@ -1,0 +1,64 @@
+#include "host/drive/NewFile.h"
+
+#include <fcntl.h>
+
+#include <cerrno>
+
+namespace host::drive {
+
+using host::system::FileDescriptor;
+
+NewFile::NewFile(NewFile&& other) noexcept
+    : _record(std::move(other._record))
+    , _folder(std::move(other._folder))
+    , _file(std::move(other._file))
+    , _name(std::exchange(other._name, {}))
+{
+}
+
+NewFile::~NewFile()
+{
+    if (!_name.empty())
+        ::unlinkat(_folder.get(), _name.c_str(), 0);
+}
+
+int NewFile::create(const DriveLayout& layout, const DriveEntry& entry, std::optional<NewFile>& file)
+{
+    NewFile fresh;
+    const auto name = uniqueName(WorkRecord::temporaryPrefix);
+    const auto folder = entry.path.substr(0, entry.path.rfind('/') + 1);
+    if (const int failure = WorkRecord::write(layout, {entry.path, folder + name, {}}, fresh._record);
+        failure != 0)
+        return failure;
+    fresh._folder = FileDescriptor(::fcntl(entry.folder.get(), F_DUPFD_CLOEXEC, 0));
+    fresh._file = FileDescriptor(
+        ::openat(entry.folder.get(), name.c_str(), O_RDWR | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC, 0666));
+    if (!fresh._folder || !fresh._file)
+        return errno;
+    fresh._name = name;
+    file.emplace(std::move(fresh));
+    return 0;
+}
+
+int NewFile::write(std::string_view text) const
+{
+    while (!text.empty()) {
+        const auto written = ::write(_file.get(), text.data(), text.size());
+        if (written < 0 && errno != EINTR)
+            return errno;
+        text.remove_prefix(written > 0 ? static_cast<std::size_t>(written) : 0);
+    }
+    return 0;
+}
+
+int NewFile::publish(const DriveEntry& entry, const std::string& name)
+{
+    if (::fsync(_file.get()) != 0)
+        return errno;
+    if (const int failure = renameEntry(_folder, _name, entry.folder, name); failure != 0)
+        return failure;
+    _name.clear();
+    return syncFolder(entry.folder);
+}
+
+} // namespace host::drive

@@ -1,0 +1,49 @@
+#include "host/drive/PromiseFile.h"
+
+#include "host/drive/SmallFile.h"
+#include "host/system/AtomicWrite.h"
+
+#include <fcntl.h>
+
+namespace host::drive {
+
+using host::system::FileDescriptor;
+
+platform::Result<PromiseRecord> readPromise(const DriveEntry& entry)
+{
+    const auto text = host::system::readWholeFile(
+        entry.folder, entry.promiseName(), PromiseRecord::maximumFileSize, entry.path);
+    if (!text)
+        return *text.error;
+    auto promise = PromiseRecord::parse(*text);
+    return promise ? platform::Result<PromiseRecord>(std::move(*promise))
+                   : damagedRecord(entry.path, "its promise is no JSON object");
+}
+
+std::string contentOfPromise(const FileDescriptor& folder, const std::string& promiseName)
+{
+    const auto text =
+        host::system::readWholeFile(folder, promiseName, PromiseRecord::maximumFileSize, promiseName);
+    const auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
+    return promise ? promise->content : std::string();
+}
+
+void dropRedundantPromise(const DriveEntry& entry, CloudStore& store)
+{
+    struct stat found;
+    if (entry.status(found) != 0)
+        return;
+    const auto promise = readPromise(entry);
+    if (!promise)
+        return;
+    const FileDescriptor document(::openat(
+        entry.folder.get(), entry.name.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
+    const auto& content = promise->content;
+    if (!content.empty() && store.holdsOtherThan(content, document))
+        return;
+    // The content first: a promise with nothing behind it is found again, a content without a promise is not.
+    if (content.empty() || store.remove(content) == 0)
+        ::unlinkat(entry.folder.get(), entry.promiseName().c_str(), 0);
+}
+
+} // namespace host::drive

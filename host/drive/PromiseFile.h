@@ -1,0 +1,21 @@
+#pragma once
+
+#include "host/drive/CloudStore.h"
+#include "host/drive/PromiseRecord.h"
+
+#include <string>
+
+namespace host::drive {
+
+/// The promise of an entry as it lies on the disk. Errors: the system's, or CloudErrorCode::DamagedRecord.
+platform::Result<PromiseRecord> readPromise(const DriveEntry& entry);
+
+/// The name of the content behind a promise file of an open folder; empty when there is none or the promise
+/// cannot be read.
+std::string contentOfPromise(const system::FileDescriptor& folder, const std::string& promiseName);
+
+/// Removes the promise beside a document when it adds nothing: nothing lies behind it, or what the document
+/// holds as well. Any other is an item that nobody has seen since the document hides it, and stays.
+void dropRedundantPromise(const DriveEntry& entry, CloudStore& store);
+
+} // namespace host::drive

@@ -1,0 +1,31 @@
+#pragma once
+
+#include "host/system/FileDescriptor.h"
+
+#include <cstdint>
+#include <functional>
+#include <string>
+
+namespace host::drive {
+
+/// Copies an item under a new name, a folder with everything in it: contents, links as links, access, user
+/// attributes and modification dates. Every file is synced and compared with what it was copied from. Answers
+/// 0 or the errno; EOPNOTSUPP for what is no file, folder or link, ELOOP below 128 levels, EBUSY for what is
+/// mounted in a folder.
+int copyTree(const system::FileDescriptor& folder, const std::string& name,
+    const system::FileDescriptor& target, const std::string& newName);
+
+/// Whether two items, folders with everything in them, hold the same names, contents and links. Attributes
+/// and dates are not compared; what cannot be read is not the same.
+bool isSameTree(const system::FileDescriptor& folder, const std::string& name,
+    const system::FileDescriptor& otherFolder, const std::string& otherName);
+
+/// Copies from where one file is to the end; answers 0 or the errno. `copied`, which may be empty, hears
+/// after each piece of at most 64 KiB how much there is now, and ends the copy with the errno that it
+/// answers.
+int copyBytes(const system::FileDescriptor& from, const system::FileDescriptor& to,
+    const std::function<int(std::uint64_t)>& copied);
+/// 0 when both hold the same bytes from their start, EIO when they do not, else the errno.
+int compareBytes(const system::FileDescriptor& a, const system::FileDescriptor& b);
+
+} // namespace host::drive
