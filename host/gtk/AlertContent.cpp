@@ -1,6 +1,7 @@
 #include "host/gtk/AlertContent.h"
 
 #include "host/gtk/BarItemPeer.h"
+#include "host/gtk/ScrolledBody.h"
 #include "host/gtk/TextFieldPeer.h"
 #include "platform/ui/TextField.h"
 
@@ -96,12 +97,7 @@ void AlertContent::buildBody()
     gtk_widget_add_css_class(_body, "alert-body");
     gtk_box_append(GTK_BOX(_body), _title);
     gtk_box_append(GTK_BOX(_body), _message);
-    auto* window = gtk_scrolled_window_new();
-    gtk_scrolled_window_set_policy(GTK_SCROLLED_WINDOW(window), GTK_POLICY_NEVER, GTK_POLICY_AUTOMATIC);
-    gtk_scrolled_window_set_propagate_natural_height(GTK_SCROLLED_WINDOW(window), TRUE);
-    gtk_scrolled_window_set_propagate_natural_width(GTK_SCROLLED_WINDOW(window), TRUE);
-    gtk_scrolled_window_set_child(GTK_SCROLLED_WINDOW(window), _body);
-    gtk_box_append(GTK_BOX(widget()), window);
+    gtk_box_append(GTK_BOX(widget()), makeScrolledBody(_body));
 }
 
 void AlertContent::addFields(const Alert& alert)
@@ -112,6 +108,8 @@ void AlertContent::addFields(const Alert& alert)
         peer->setOnReturn([this] { returnPressed(); });
         // The alert gives its fields their places; the model's own frames have no part in it.
         peer->setRoot([](platform::Size) {}, [](double) { return platform::Size{0, fieldHeight}; });
+        if (field->accessibility().label.empty() && field->placeholder().empty())
+            peer->setAccessibleName(alert.message().empty() ? alert.title() : alert.message());
         gtk_box_append(GTK_BOX(_body), peer->widget());
         _peers.push_back(std::move(peer));
     }

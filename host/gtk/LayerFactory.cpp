@@ -19,6 +19,7 @@ namespace ui = platform::ui;
 namespace {
 
 constexpr int popoverWidth = 320, popoverHeight = 420; ///< of a screen in a popover, points
+constexpr int widestPopover = 360; ///< its arrow and shadow included
 
 /// A whole screen as the content of a layer.
 class ScreenContent : public LayerContent {
@@ -65,6 +66,17 @@ std::optional<GdkRectangle> anchorOf(
         return peer ? boundsIn(canvas, peer->widget(), place->rect) : std::nullopt;
     }
     return std::nullopt;
+}
+
+/// Beside the anchor where only such arrows are allowed and there is room, else below it.
+GtkPositionType sideOf(const ui::PopoverAnchor& anchor, const GdkRectangle& place, double windowWidth)
+{
+    const auto* view = std::get_if<ui::ViewAnchor>(&anchor);
+    if (!view || view->arrows != ui::ArrowDirections::LeftOrRight)
+        return GTK_POS_BOTTOM;
+    if (windowWidth - place.x - place.width >= widestPopover)
+        return GTK_POS_RIGHT;
+    return place.x >= widestPopover ? GTK_POS_LEFT : GTK_POS_BOTTOM;
 }
 
 class LayerMaker : public ui::ViewControllerVisitor {
@@ -130,7 +142,9 @@ private:
     void makePopover(
         ui::ViewController& screen, std::unique_ptr<LayerContent> content, const GdkRectangle& anchor)
     {
-        layer = std::make_unique<PopoverLayer>(_site.canvas, anchor, std::move(content), cancel(screen));
+        const auto side = sideOf(screen.popoverAnchor(), anchor, _site.size.width);
+        layer =
+            std::make_unique<PopoverLayer>(_site.canvas, anchor, side, std::move(content), cancel(screen));
     }
 
     const std::shared_ptr<PeerContext>& _context;

@@ -1,6 +1,7 @@
 #include "host/gtk/MenuPopover.h"
 
 #include "host/gtk/ImagePaint.h"
+#include "host/gtk/ObjectRef.h"
 #include "host/gtk/Signal.h"
 
 #include <memory>
@@ -23,6 +24,16 @@ void endLater(GtkWidget* popover)
             g_object_unref(data);
         },
         g_object_ref(popover));
+}
+
+/// Where the keyboard was before a popover took it, to be given back when it closes.
+void restoreFocus(GtkWidget* popover, GtkWidget* before)
+{
+    auto* root = gtk_widget_get_root(popover);
+    if (!root)
+        return;
+    const bool isStillThere = before && gtk_widget_get_root(before) == root && gtk_widget_get_mapped(before);
+    gtk_root_set_focus(root, isStillThere ? before : nullptr);
 }
 
 void runLater(std::function<void()> handler)
@@ -81,7 +92,11 @@ void showMenu(GtkWidget* parent, double x, double y, const ui::Menu& menu)
     gtk_widget_set_parent(popover, parent);
     const GdkRectangle at{static_cast<int>(x), static_cast<int>(y), 1, 1};
     gtk_popover_set_pointing_to(GTK_POPOVER(popover), &at);
-    connectForLife<void()>(popover, "closed", [popover] { endLater(popover); });
+    auto* focused = gtk_root_get_focus(gtk_widget_get_root(parent));
+    connectForLife<void()>(popover, "closed", [popover, before = ObjectRef<GtkWidget>::retain(focused)] {
+        restoreFocus(popover, before.get());
+        endLater(popover);
+    });
     gtk_popover_popup(GTK_POPOVER(popover));
 }
 

@@ -4,7 +4,7 @@
 
 namespace host::gtk {
 
-PopoverLayer::PopoverLayer(GtkWidget* parent, const GdkRectangle& anchor,
+PopoverLayer::PopoverLayer(GtkWidget* parent, const GdkRectangle& anchor, GtkPositionType side,
     std::unique_ptr<LayerContent> content, std::function<void()> onOutside)
     : _content(std::move(content))
     , _popover(ObjectRef<GtkWidget>::retain(gtk_popover_new()))
@@ -14,6 +14,7 @@ PopoverLayer::PopoverLayer(GtkWidget* parent, const GdkRectangle& anchor,
     gtk_widget_add_css_class(_popover.get(), "kit-popover");
     gtk_widget_set_parent(_popover.get(), parent);
     gtk_popover_set_pointing_to(popover, &anchor);
+    gtk_popover_set_position(popover, side);
     _onClosed = connectSignal<void()>(popover, "closed", [this, call = std::move(onOutside)] {
         const bool byUser = std::exchange(_shown, false);
         if (const auto outside = call; byUser && outside)

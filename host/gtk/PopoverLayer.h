@@ -13,9 +13,9 @@ namespace host::gtk {
 class PopoverLayer : public PresentedLayer {
 public:
     /// `parent` is a widget that outlives the layer and lets a popover be its child; `onOutside` is called
-    /// when the user leaves the popover.
-    PopoverLayer(GtkWidget* parent, const GdkRectangle& anchor, std::unique_ptr<LayerContent> content,
-        std::function<void()> onOutside);
+    /// when the user leaves the popover. It stands on `side` of the anchor.
+    PopoverLayer(GtkWidget* parent, const GdkRectangle& anchor, GtkPositionType side,
+        std::unique_ptr<LayerContent> content, std::function<void()> onOutside);
     ~PopoverLayer() override;
 
     void show(bool animated, Done done) override;

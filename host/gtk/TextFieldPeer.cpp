@@ -120,8 +120,12 @@ void TextFieldPeer::mirrorContent(const ui::TextField& field)
     const auto& label = field.accessibility().label;
     const auto& name = label.empty() ? field.placeholder() : label;
     if (!name.empty())
-        gtk_accessible_update_property(
-            GTK_ACCESSIBLE(entry), GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
+        setAccessibleName(name);
+}
+
+void TextFieldPeer::setAccessibleName(const std::string& name)
+{
+    gtk_accessible_update_property(GTK_ACCESSIBLE(native()), GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
 }
 
 void TextFieldPeer::mirrorText(const ui::TextField& field)

@@ -17,6 +17,8 @@ public:
     bool grabFocus() override;
     /// The entry's own height: the theme wants more room around a text than a line of it.
     std::optional<platform::Size> nativeSize(const platform::ui::View& view, double maxWidth) override;
+    /// What the entry is called where neither its label nor its placeholder says so.
+    void setAccessibleName(const std::string& name);
     /// Called when the return key was pressed and the field's delegate did not object.
     void setOnReturn(std::function<void()> callback) { _onReturn = std::move(callback); }
 

@@ -185,6 +185,15 @@ bool ViewPeer::grabFocus()
     return _native && gtk_widget_grab_focus(_native.get());
 }
 
+/// Lets the focus go where it is still here; the user may have moved it on already.
+void ViewPeer::dropFocus()
+{
+    auto* root = gtk_widget_get_root(widget());
+    auto* focused = root ? gtk_root_get_focus(root) : nullptr;
+    if (focused && (focused == widget() || gtk_widget_is_ancestor(focused, widget())))
+        gtk_root_set_focus(root, nullptr);
+}
+
 void ViewPeer::viewWantsFocus(View&, bool focus)
 {
     // Later: the view may have been made only now, and its widget may not be in the window yet.
@@ -195,8 +204,8 @@ void ViewPeer::viewWantsFocus(View&, bool focus)
             return;
         if (focus)
             self->grabFocus();
-        else if (auto* root = gtk_widget_get_root(self->widget()))
-            gtk_root_set_focus(root, nullptr);
+        else
+            self->dropFocus();
     });
 }
 

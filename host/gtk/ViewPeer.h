@@ -71,6 +71,7 @@ private:
     void mirrorSubviews(const platform::ui::View& view);
     void mirrorAccessibility(const platform::ui::View& view);
     void mirrorGestures(const platform::ui::View& view);
+    void dropFocus();
     void queueAllocateInParent() const;
     void snapshotBackground(
         const platform::ui::View& view, GtkSnapshot* snapshot, const GskRoundedRect& shape);

@@ -206,6 +206,17 @@ void WindowPeer::windowWillPresent(
     shown->focus();
 }
 
+/// Without a place to give it back to, nothing has it: not whatever comes first in the window.
+void WindowPeer::giveFocusBack(GtkWidget* before) const
+{
+    const bool isThere =
+        before && gtk_widget_get_root(before) == GTK_ROOT(_window.get()) && gtk_widget_get_mapped(before);
+    if (isThere)
+        gtk_widget_grab_focus(before);
+    else
+        gtk_window_set_focus(window(), nullptr);
+}
+
 void WindowPeer::windowWillDismiss(
     ui::Window&, const ui::Presentation& presentation, ui::TransitionToken token)
 {
@@ -218,9 +229,7 @@ void WindowPeer::windowWillDismiss(
     const Layer gone = *found;
     _layers.erase(found);
     coverAllButTop();
-    auto* before = gone.focusBefore.get();
-    if (before && gtk_widget_get_root(before) == GTK_ROOT(_window.get()) && gtk_widget_get_mapped(before))
-        gtk_widget_grab_focus(before);
+    giveFocusBack(gone.focusBefore.get());
     const bool moves =
         presentation.animated && _theme->animationsEnabled() && gtk_widget_get_mapped(_overlay);
     _leaving.push_back(gone.layer);

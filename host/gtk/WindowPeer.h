@@ -65,6 +65,7 @@ private:
     void updateScreen(platform::Size size) const;
     void themeChanged();
     void coverAllButTop();
+    void giveFocusBack(GtkWidget* before) const;
     void layerHasGone(const std::shared_ptr<PresentedLayer>& layer);
     bool goBack();
     void closed();

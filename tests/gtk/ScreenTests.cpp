@@ -160,6 +160,53 @@ TEST_F(AlertTests, EscapeCancelsAndAnimationsEnd)
     }
 }
 
+TEST_F(AlertTests, TheKeyboardGoesThroughAnAlertAndBack)
+{
+    root = makeScreen("Root");
+    const auto below = std::make_shared<ui::TextField>("below");
+    below->setFrame({20, 20, 200, 50});
+    root->view()->addSubview(below);
+    show(root);
+    below->becomeFirstResponder();
+    settle();
+    const auto focus = [this] { return gtk_root_get_focus(GTK_ROOT(windowWidget())); };
+    auto* before = focus();
+    ASSERT_NE(before, nullptr);
+
+    const auto alert =
+        std::make_shared<ui::AlertController>("Rename", "Enter a name.", ui::AlertStyle::Alert);
+    alert->addTextField([](ui::TextField& field) { field.setText("Plans"); });
+    const auto cancel = std::make_shared<ui::AlertAction>("Cancel", ui::AlertActionStyle::Default);
+    alert->addAction(cancel);
+    alert->addAction(std::make_shared<ui::AlertAction>("Done", ui::AlertActionStyle::Default));
+    alert->setEscapeAction(cancel);
+    root->presentViewController(alert, true);
+    settle();
+    for (const char* next : {"Cancel", "Done"}) {
+        gtk_widget_child_focus(windowWidget(), GTK_DIR_TAB_FORWARD);
+        settle();
+        EXPECT_EQ(focus(), findButton(next)) << "the field that was left does not take the focus along";
+    }
+    EXPECT_TRUE(window->backRequested());
+    settle();
+    EXPECT_EQ(root->presentedViewController(), nullptr);
+    EXPECT_EQ(focus(), before);
+}
+
+TEST_F(AlertTests, AnAlertIsAsHighAsItsBrokenLines)
+{
+    const auto alert = std::make_shared<ui::AlertController>(
+        "Objekt umbenennen", "Gib einen neuen Namen für dieses Objekt ein.", ui::AlertStyle::Alert);
+    alert->addTextField({});
+    alert->addAction(std::make_shared<ui::AlertAction>("Fertig", ui::AlertActionStyle::Default));
+    present(alert);
+    auto* field = peerOf(*alert->textFields().front())->widget();
+    auto* scrolled = gtk_widget_get_ancestor(field, GTK_TYPE_SCROLLED_WINDOW);
+    auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(scrolled));
+    EXPECT_EQ(gtk_adjustment_get_upper(adjustment), gtk_adjustment_get_page_size(adjustment))
+        << "nothing is hidden where the window has the room";
+}
+
 class Numbers : public ui::ListViewDataSource, public ui::ListViewDelegate {
 public:
     std::size_t numberOfRows(const ui::ListView&) const override { return ids.size(); }
