@@ -23,6 +23,11 @@ std::string logText(const ContainedItems& items)
     return items.list ? platform::logText(items.list->containedItems()) : "(null)";
 }
 
+std::string logText(const SelectedItems& items)
+{
+    return items.list ? platform::logText(items.list->selectedItems()) : "(null)";
+}
+
 std::string logText(const PresentedType& type)
 {
     const auto value =

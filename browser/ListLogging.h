@@ -18,6 +18,12 @@ struct ContainedItems {
 };
 std::string logText(const ContainedItems& items);
 
+/// Reads as the URLs of the items that are selected in a list, which may be null.
+struct SelectedItems {
+    std::shared_ptr<const platform::components::DocumentListController> list;
+};
+std::string logText(const SelectedItems& items);
+
 /// Reads as the content type of the folder that a list shows.
 struct PresentedType {
     std::shared_ptr<const platform::components::DocumentListController> list;

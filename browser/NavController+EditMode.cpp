@@ -1,4 +1,4 @@
-// How a list's bars are configured, and the line under it.
+// How a list's bars are configured, the line under it, and the choosing of several items.
 
 #include "browser/ListLogging.h"
 #include "browser/NavController.h"
@@ -19,11 +19,21 @@ using platform::Operation;
 using platform::services;
 using platform::components::DocumentListAction;
 using platform::components::DocumentListController;
+using platform::ui::BarButtonItem;
+using platform::ui::SystemItem;
 
 namespace {
 
-constexpr auto offeredActions = actionBit(DocumentListAction::Delete) | actionBit(DocumentListAction::Rename)
-    | actionBit(DocumentListAction::PressurePop);
+/// What the list's title says while items are chosen.
+std::string selectionTitle(std::size_t selected)
+{
+    return selected == 0
+        ? platform::localized("Select Items")
+        : platform::localizedPlural(".DICT.ITEMS_SELECTED.%d", {static_cast<std::int64_t>(selected)});
+}
+
+constexpr auto offeredActions = actionBit(DocumentListAction::Delete) | actionBit(DocumentListAction::Info)
+    | actionBit(DocumentListAction::Rename) | actionBit(DocumentListAction::PressurePop);
 
 } // namespace
 
@@ -43,9 +53,19 @@ void NavController::initNewListController(const List& list)
 
 void NavController::configureNavBar(const List& list)
 {
-    list->navigationItem().setRightItem(nullptr);
-    list->navigationItem().setHidesBackButton(false);
-    list->setTitle(_viewTitle);
+    const auto calling = [weak = std::weak_ptr(self())](void (NavController::*operation)(const Sender&)) {
+        return [weak, operation](const Sender& sender) {
+            if (const auto browser = weak.lock())
+                (*browser.*operation)(sender);
+        };
+    };
+    const auto button = _editMode
+        ? std::make_shared<BarButtonItem>(SystemItem::Cancel, calling(&NavController::endEditMode))
+        : std::make_shared<BarButtonItem>(
+            platform::localized("Select"), calling(&NavController::beginEditMode));
+    list->navigationItem().setRightItem(button);
+    list->navigationItem().setHidesBackButton(_editMode);
+    list->setTitle(_editMode ? platform::localized("Select Items") : _viewTitle);
 }
 
 void NavController::configureToolbar(const List& list)
@@ -66,6 +86,63 @@ void NavController::updateStatusUI(const List& list)
         return;
     bar->setStatusText(toolbarStatusText(shown->containedItemCount()));
     bar->showUpgradeOffer(_upgradeOffer);
+    if (_editMode)
+        shown->setTitle(selectionTitle(shown->selectedItemCount()));
+}
+
+void NavController::beginEditMode(const Sender&)
+{
+    static constexpr Operation op{"-[NavController beginEditMode:]"};
+    op.userAction("Pressed Select (begin edit)");
+    op.info("Begin Edit mode");
+    setEditModeAndUpdateUIForViewController(true, getTopDocumentListController());
+}
+
+void NavController::endEditMode(const Sender&)
+{
+    static constexpr Operation op{"-[NavController endEditMode:]"};
+    op.userAction("Pressed Cancel (end edit)");
+    const auto list = getTopDocumentListController();
+    op.debug(
+        "EndEditMode.  Selected %d items: %@", list ? list->selectedItemCount() : 0, SelectedItems{list});
+    setEditModeAndUpdateUIForViewController(false, list);
+}
+
+void NavController::selectAllItems(const Sender&)
+{
+    static constexpr Operation op{"-[NavController selectAllItems:]"};
+    op.userAction("Pressed SelectAll");
+    op.info("Pressed SelectAll");
+    const auto list = getTopDocumentListController();
+    if (!list)
+        return;
+    op.debug("DLC has %d contained items", list->containedItemCount());
+    list->selectAllItems();
+    op.debug("Selected all %d: %@", list->selectedItemCount(), SelectedItems{list});
+}
+
+void NavController::setEditModeAndUpdateUIForViewController(bool editMode, const List& list)
+{
+    _editMode = editMode;
+    if (list)
+        list->setEditingAnimated(editMode, true);
+    configureVisibleControllerForMode();
+}
+
+void NavController::configureVisibleControllerForMode()
+{
+    const auto list = getTopDocumentListController();
+    if (!list)
+        return;
+    configureNavBar(list);
+    configureToolbar(list);
+    updateStatusUI(list);
+}
+
+void NavController::documentListControllerRequestsEditing(const List& list)
+{
+    if (!_editMode && list == topViewController())
+        beginEditMode(nullptr);
 }
 
 std::string NavController::toolbarStatusText(std::size_t itemCount) const

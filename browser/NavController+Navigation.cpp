@@ -93,6 +93,8 @@ void NavController::navigationControllerDidShowViewControllerAnimated(
     if (!list)
         return;
     dropItemManager();
+    if (_editMode)
+        _editMode = list->editing();
     updateStatusUI(list);
     initNewListController(list);
     setToolbarHidden(false);
@@ -186,6 +188,10 @@ void NavController::documentListControllerDidSelectContainerWithViewController(
         return;
     }
     op.info("User selected folder %@", *container->presentedURL());
+    if (_editMode) {
+        op.warning("DLC Navigation not allowed while in edit mode");
+        return;
+    }
     if (isSearchPresented()) {
         dismissViewController(true);
         // What was found is shown in its real place in the drive.
@@ -206,6 +212,10 @@ void NavController::documentListControllerDidSelectItemAtURL(const List&, const 
         item ? item->fileSize() : std::nullopt, url.pathExtension());
     if (!item) {
         showVanishedItem(url);
+        return;
+    }
+    if (_editMode) {
+        op.debug("DLC Selection not allowed while in edit mode");
         return;
     }
     if (item->isSymlink())
@@ -260,7 +270,10 @@ void NavController::documentListControllerItemsChanged(const List& list)
     _pickerIsAlive = true;
     if (list != topViewController())
         return;
-    if (const auto count = list->containedItemCount(); count != lastLoggedCount) {
+    const auto count = list->containedItemCount();
+    if (_editMode) {
+        op.debug("DLC selected item count is %{public}@", list->selectedItemCount());
+    } else if (count != lastLoggedCount) {
         lastLoggedCount = count;
         op.debug("DLC items changed, count is %{public}@", count);
     }

@@ -43,6 +43,8 @@ public:
 
     ~NavController() override;
 
+    /// Whether several items are being chosen; lists then neither open nor navigate.
+    bool editMode() const { return _editMode; }
     /// Whether a list has reported its contents since the last set-up; the status line waits for that.
     bool pickerIsAlive() const { return _pickerIsAlive; }
     /// An enclosing split view, for its owner's use; null: none.
@@ -102,6 +104,17 @@ public:
     std::string quotaAvailableString() const;
     bool okToShowQuota() const { return _lastQuotaFetch.has_value(); }
 
+    // Edit mode: several items are chosen with check marks.
+    using Sender = std::shared_ptr<platform::ui::BarButtonItem>; ///< what was pressed; null: nothing
+    void beginEditMode(const Sender& sender);
+    void endEditMode(const Sender& sender);
+    /// Selects everything that the list on top contains.
+    void selectAllItems(const Sender& sender);
+    /// The one place that changes the mode; a null list changes the browser alone.
+    void setEditModeAndUpdateUIForViewController(bool editMode, const List& list);
+    /// Configures the bars of the list on top for the mode.
+    void configureVisibleControllerForMode();
+
     // Saved state: the previewed item and its preview mode.
     void encodeRestorableStateWithCoder(platform::StateCoder& coder) override;
     void decodeRestorableStateWithCoder(const platform::StateCoder& coder) override;
@@ -128,6 +141,7 @@ public:
     void documentListControllerDidSelectItemAtURL(const List& list, const platform::Url& url) override;
     void documentListControllerItemsChanged(const List& list) override;
     void documentListControllerURLWasRemoved(const List& list) override;
+    void documentListControllerRequestsEditing(const List& list) override;
     Screen documentListControllerViewControllerForPreviewingItemAtURL(
         const List& list, const platform::Url& url) override;
     void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,
@@ -179,6 +193,7 @@ private:
     void performInfo(const platform::Url& url);
     void deleteConfirmed(const std::vector<platform::Url>& urls, const Completion& finished);
 
+    bool _editMode = false;
     bool _pickerIsAlive = false;
     std::weak_ptr<platform::ui::ViewController> _splitViewController;
     std::string _viewTitle;

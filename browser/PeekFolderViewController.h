@@ -11,8 +11,15 @@ public:
 
     using DocumentListController::DocumentListController;
 
+    /// Actions that the peek itself would offer; the program sets none.
+    const platform::ui::Menu& previewActionItems() const { return _previewActionItems; }
+    void setPreviewActionItems(platform::ui::Menu items) { _previewActionItems = std::move(items); }
+
     /// A peek has no room for a search field.
     bool shouldShowSearch() const override { return false; }
+
+private:
+    platform::ui::Menu _previewActionItems;
 };
 
 } // namespace tarrow

@@ -5,12 +5,14 @@
 #include <algorithm>
 #include <memory>
 #include <numbers>
+#include <string_view>
 
 namespace {
 
 namespace ui = platform::ui;
 
 constexpr int iconSize = 32, smallIconSize = 16;
+constexpr float markMargin = 8; ///< beside a check mark a finger still means it
 constexpr int dotDiameter = 10, dotStep = 7; ///< dots of several tags overlap
 
 /// What a row may hold, from its leading edge to its trailing one.
@@ -22,6 +24,7 @@ struct TrwListRow {
     GtkWidget* parts[partCount]; ///< made when a row first needs them: 205 rows live beside the visible ones
     GtkWidget *title, *detail;
     ui::ListRow* shown;
+    host::gtk::ListRowWidget::Handler* handler;
     bool isFilled;
 };
 
@@ -42,6 +45,13 @@ void activate(GtkWidget* widget, const char*, GVariant*)
         widget, "list.activate-item", "u", gtk_list_item_get_position(rowOf(widget)->item));
 }
 
+void request(GtkWidget* widget, const char* action, GVariant*)
+{
+    using host::gtk::ListRowWidget::Request;
+    const bool isMenu = std::string_view(action) == "row.menu";
+    (*rowOf(widget)->handler)(widget, isMenu ? Request::Menu : Request::Peek);
+}
+
 void dispose(GObject* object)
 {
     auto* widget = GTK_WIDGET(object);
@@ -53,6 +63,7 @@ void dispose(GObject* object)
 void finalize(GObject* object)
 {
     delete rowOf(object)->shown;
+    delete rowOf(object)->handler;
     G_OBJECT_CLASS(trw_list_row_parent_class)->finalize(object);
 }
 
@@ -94,6 +105,8 @@ void trw_list_row_class_init(TrwListRowClass* type)
     gtk_widget_class_set_accessible_role(widget, GTK_ACCESSIBLE_ROLE_BUTTON);
     gtk_widget_class_set_css_name(widget, "kit-row");
     gtk_widget_class_install_action(widget, "row.activate", nullptr, activate);
+    gtk_widget_class_install_action(widget, "row.menu", nullptr, request);
+    gtk_widget_class_install_action(widget, "row.peek", nullptr, request);
 }
 
 GtkWidget* label(const char* styleClass, PangoEllipsizeMode ellipsize)
@@ -246,10 +259,11 @@ void showAccessible(TrwListRow* row, const ui::ListRow& content)
 
 namespace host::gtk::ListRowWidget {
 
-GtkWidget* make(GtkListItem* item)
+GtkWidget* make(GtkListItem* item, Handler handler)
 {
     auto* row = rowOf(g_object_new(trw_list_row_get_type(), nullptr));
     row->item = item;
+    row->handler = new Handler(std::move(handler));
     return GTK_WIDGET(row);
 }
 
@@ -283,6 +297,17 @@ const ui::ListRow& shown(GtkWidget* row)
 guint position(GtkWidget* row)
 {
     return gtk_list_item_get_position(rowOf(row)->item);
+}
+
+bool isOnMark(GtkWidget* row, double x)
+{
+    auto* mark = rowOf(row)->parts[Check];
+    graphene_rect_t bounds;
+    if (!mark || !gtk_widget_get_visible(mark) || !gtk_widget_compute_bounds(mark, row, &bounds))
+        return false;
+    const bool isRightToLeft = gtk_widget_get_direction(row) == GTK_TEXT_DIR_RTL;
+    return isRightToLeft ? x >= bounds.origin.x - markMargin
+                         : x <= bounds.origin.x + bounds.size.width + markMargin;
 }
 
 const char* titleText(GtkWidget* row)

@@ -2,19 +2,28 @@
 
 #include "platform/ui/ListRow.h"
 
+#include <functional>
+
 #include <gtk/gtk.h>
 
 namespace host::gtk {
 
-/// The widget of one row of a list. To assistive technology it is a button with the action "row.activate".
+/// The widget of one row of a list. To assistive technology it is a button with the actions "row.activate",
+/// "row.menu" and "row.peek".
 namespace ListRowWidget {
 
-GtkWidget* make(GtkListItem* item);
+/// What an action asks for at the row's present place.
+enum class Request { Menu, Peek };
+using Handler = std::function<void(GtkWidget* row, Request request)>;
+
+GtkWidget* make(GtkListItem* item, Handler handler);
 bool isRow(GtkWidget* widget);
 /// Shows a row; cheap when it is what the widget shows already.
 void show(GtkWidget* row, const platform::ui::ListRow& content, double height);
 const platform::ui::ListRow& shown(GtkWidget* row);
 guint position(GtkWidget* row);
+/// Whether a point of the row, in its own coordinates, lies on the check mark or before it.
+bool isOnMark(GtkWidget* row, double x);
 /// The text of the title, as the label has it.
 const char* titleText(GtkWidget* row);
 

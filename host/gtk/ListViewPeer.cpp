@@ -6,6 +6,7 @@
 #include "host/gtk/RowModel.h"
 
 #include <algorithm>
+#include <cmath>
 
 namespace host::gtk {
 
@@ -18,6 +19,11 @@ namespace {
 constexpr std::size_t livingRows = 220;
 /// How many of them are made in one frame, so that a frame stays a frame: the first fill a tall screen.
 constexpr std::size_t firstRows = 24, moreRows = 12;
+/// The widgets take so many single changes at once; more are told in one away from what is seen.
+constexpr std::size_t mostSplices = 16;
+constexpr double markDragStart = 8; ///< points; a finger that only taps moves less
+constexpr int layoutFrames = 2; ///< after so many frames new rows have their heights
+constexpr int focusFrames = 4; ///< a row that was scrolled to has its widget after one or two
 
 template <typename Observer, typename Peer>
 std::shared_ptr<Observer> observing(Peer& peer)
@@ -55,6 +61,8 @@ ListViewPeer::~ListViewPeer()
 {
     context().scheduler().cancel(&_refreshKey);
     context().scheduler().cancel(&_growKey);
+    context().scheduler().cancel(&_focusKey);
+    context().scheduler().cancel(&_scrollKey);
     _onScroll.disconnect();
     // The list ends now, while its rows' handlers are still connected to this.
     gtk_list_view_set_model(GTK_LIST_VIEW(_listWidget), nullptr);
@@ -109,34 +117,78 @@ void ListViewPeer::connectInput()
             list->pulledToRefresh();
     }));
     auto* keys = gtk_event_controller_key_new();
+    // Before the list's own keys, of which some mean something else here.
+    gtk_event_controller_set_propagation_phase(keys, GTK_PHASE_CAPTURE);
     gtk_widget_add_controller(_listWidget, keys);
     connect(connectSignal<gboolean(guint, guint, GdkModifierType)>(
         keys, "key-pressed", [this](guint key, guint, GdkModifierType modifiers) -> gboolean {
             return keyPressed(key, modifiers);
         }));
+    auto* click = gtk_gesture_click_new();
+    gtk_gesture_single_set_button(GTK_GESTURE_SINGLE(click), GDK_BUTTON_SECONDARY);
+    gtk_widget_add_controller(_listWidget, GTK_EVENT_CONTROLLER(click));
+    connect(connectSignal<void(int, double, double)>(
+        click, "pressed", [this](int, double x, double y) { showMenuOfList(x, y); }));
+    connectMarks();
+}
+
+/// To draw along the check marks selects or deselects all rows on the way.
+void ListViewPeer::connectMarks()
+{
+    auto* drag = gtk_gesture_drag_new();
+    gtk_event_controller_set_propagation_phase(GTK_EVENT_CONTROLLER(drag), GTK_PHASE_CAPTURE);
+    gtk_widget_add_controller(_listWidget, GTK_EVENT_CONTROLLER(drag));
+    connect(connectSignal<void(double, double)>(drag, "drag-begin", [this, drag](double x, double y) {
+        auto* row = rowAt(x, y);
+        double rowX = 0, rowY = 0;
+        if (row)
+            gtk_widget_translate_coordinates(_listWidget, row, x, y, &rowX, &rowY);
+        const bool isMark = row && !isShiftHeld(_listWidget) && ListRowWidget::isOnMark(row, rowX);
+        gtk_gesture_set_state(drag, isMark ? GTK_EVENT_SEQUENCE_CLAIMED : GTK_EVENT_SEQUENCE_DENIED);
+        if (const auto list = _list.lock(); list && isMark)
+            list->activateRow(ListRowWidget::position(row));
+    }));
+    connect(connectSignal<void(double, double)>(drag, "drag-update", [this, drag](double x, double y) {
+        double startX = 0, startY = 0;
+        gtk_gesture_drag_get_start_point(GTK_GESTURE_DRAG(drag), &startX, &startY);
+        auto* row = rowAt(startX, startY + y);
+        const auto list = _list.lock();
+        const bool hasMoved = std::hypot(x, y) >= markDragStart;
+        if (list && row && hasMoved && list->selectionMode() == ui::SelectionMode::Multiple)
+            list->extendSelectionTo(ListRowWidget::position(row));
+    }));
 }
 
 void ListViewPeer::setUpRow(GtkListItem* item)
 {
-    auto* row = ListRowWidget::make(item);
+    const std::weak_ptr<ListViewPeer> peer = std::static_pointer_cast<ListViewPeer>(shared_from_this());
+    using Request = ListRowWidget::Request;
+    auto* row = ListRowWidget::make(item, [peer](GtkWidget* asked, Request request) {
+        const double x = gtk_widget_get_width(asked) / 2.0, y = gtk_widget_get_height(asked) / 2.0;
+        const auto self = peer.lock();
+        if (self && request == Request::Peek)
+            self->held(asked, x, y);
+        else if (self)
+            self->showMenuOf(asked, x, y);
+    });
+    const auto answer = [peer, row](void (ListViewPeer::*show)(GtkWidget*, double, double)) {
+        return [peer, row, show](GtkGesture* gesture, double x, double y) {
+            const auto self = peer.lock();
+            if (!self)
+                return;
+            gtk_gesture_set_state(gesture, GTK_EVENT_SEQUENCE_CLAIMED);
+            (*self.*show)(row, x, y);
+        };
+    };
     auto* press = gtk_gesture_long_press_new();
     gtk_widget_add_controller(row, GTK_EVENT_CONTROLLER(press));
-    const auto weak = std::static_pointer_cast<ListViewPeer>(shared_from_this());
-    const std::weak_ptr<ListViewPeer> peer = weak;
-    const auto menu = [peer, row](GtkGesture* gesture, double x, double y) {
-        const auto self = peer.lock();
-        if (!self)
-            return;
-        gtk_gesture_set_state(gesture, GTK_EVENT_SEQUENCE_CLAIMED);
-        self->showMenuOf(row, x, y);
-    };
-    connectForLife<void(double, double)>(
-        press, "pressed", [menu, press](double x, double y) { menu(press, x, y); });
+    connectForLife<void(double, double)>(press, "pressed",
+        [hold = answer(&ListViewPeer::held), press](double x, double y) { hold(press, x, y); });
     auto* click = gtk_gesture_click_new();
     gtk_gesture_single_set_button(GTK_GESTURE_SINGLE(click), GDK_BUTTON_SECONDARY);
     gtk_widget_add_controller(row, GTK_EVENT_CONTROLLER(click));
-    connectForLife<void(int, double, double)>(
-        click, "pressed", [menu, click](int, double x, double y) { menu(click, x, y); });
+    connectForLife<void(int, double, double)>(click, "pressed",
+        [menu = answer(&ListViewPeer::showMenuOf), click](int, double x, double y) { menu(click, x, y); });
     gtk_list_item_set_child(item, row);
 }
 
@@ -179,23 +231,6 @@ void ListViewPeer::scrolled()
     list->userScrolled({0, gtk_adjustment_get_value(adjustment) - top});
 }
 
-bool ListViewPeer::keyPressed(guint key, GdkModifierType modifiers)
-{
-    const auto list = _list.lock();
-    if (list && key == GDK_KEY_F5 && list->isRefreshable() && !list->isRefreshing()) {
-        list->pulledToRefresh();
-        return true;
-    }
-    if (key != GDK_KEY_Menu && !(key == GDK_KEY_F10 && (modifiers & GDK_SHIFT_MASK)))
-        return false;
-    auto* focused = gtk_root_get_focus(gtk_widget_get_root(_listWidget));
-    auto* row = focused ? gtk_widget_get_first_child(focused) : nullptr;
-    if (!row || !ListRowWidget::isRow(row))
-        return false;
-    showMenuOf(row, gtk_widget_get_width(row) / 2.0, gtk_widget_get_height(row) / 2.0);
-    return true;
-}
-
 void ListViewPeer::showMenuOf(GtkWidget* row, double x, double y)
 {
     const auto list = _list.lock();
@@ -205,6 +240,22 @@ void ListViewPeer::showMenuOf(GtkWidget* row, double x, double y)
     double listX = x, listY = y;
     gtk_widget_translate_coordinates(row, widget(), x, y, &listX, &listY);
     showMenu(widget(), listX, listY, list->menuForRow(ListRowWidget::position(row)));
+}
+
+void ListViewPeer::showMenuOfList(double x, double y)
+{
+    const auto list = _list.lock();
+    double listX = x, listY = y;
+    gtk_widget_translate_coordinates(_listWidget, widget(), x, y, &listX, &listY);
+    if (list)
+        showMenu(widget(), listX, listY, list->menuForList());
+}
+
+void ListViewPeer::held(GtkWidget* row, double x, double y)
+{
+    const auto list = _list.lock();
+    if (list && !list->holdRow(ListRowWidget::position(row)))
+        showMenuOf(row, x, y);
 }
 
 bool ListViewPeer::grabFocus()
@@ -261,14 +312,20 @@ void ListViewPeer::rowsWereReset(ui::ListView& list)
 
 void ListViewPeer::rowsDidChange(ui::ListView& list, const ui::ListChanges& changes)
 {
+    auto* focused = focusedRow();
+    const auto focusedAt = focused ? std::optional(ListRowWidget::position(focused)) : std::nullopt;
     // A list that still grows shows its beginning only: its rows are read anew instead.
     if (g_list_model_get_n_items(_rows.get()) == rowCountBefore(list, changes)) {
-        for (const auto& splice : changes.splices)
+        const bool isMuch = changes.splices.size() > mostSplices;
+        for (const auto& splice : isMuch ? changes.splicesExactWithin(list.visibleRows()) : changes.splices)
             RowModel::splice(_rows.get(), static_cast<guint>(splice.position),
                 static_cast<guint>(splice.removed), static_cast<guint>(splice.inserted));
     }
     showRows(list.rowCount());
     refreshRowsLater();
+    // The row that had the keyboard is gone: the one that came to its place has it now.
+    if (focusedAt && !focusedRow() && list.rowCount() > 0)
+        focusSoon(std::min<std::size_t>(*focusedAt, list.rowCount() - 1), focusFrames);
 }
 
 void ListViewPeer::rowDidChange(ui::ListView&, std::size_t /*index*/)
@@ -296,11 +353,24 @@ void ListViewPeer::refreshRows()
 
 void ListViewPeer::scrollTo(ui::ScrollView& view, Point offset, bool /*animated*/)
 {
-    if (const auto list = _list.lock(); list && offset.y > 0)
-        RowModel::complete(_rows.get(), static_cast<guint>(list->rowCount()));
-    const SignalBlock block(_onScroll);
+    moveTo(offset.y + view.contentInsets().top, layoutFrames);
+}
+
+void ListViewPeer::moveTo(double value, int frames)
+{
+    const auto list = _list.lock();
     auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
-    gtk_adjustment_set_value(adjustment, offset.y + view.contentInsets().top);
+    const double end = value + gtk_adjustment_get_page_size(adjustment);
+    const bool isKnown = end <= gtk_adjustment_get_upper(adjustment);
+    if (!list || value <= 0 || isKnown || frames == 0) {
+        const SignalBlock block(_onScroll);
+        gtk_adjustment_set_value(adjustment, value);
+        return;
+    }
+    // The widgets have no height for rows that they have not laid out yet, nor a place among them.
+    RowModel::complete(_rows.get(), static_cast<guint>(list->rowCount()));
+    context().scheduler().scheduleNextFrame(
+        &_scrollKey, [this, value, frames] { moveTo(value, frames - 1); });
 }
 
 void ListViewPeer::scrollExtentDidChange(ui::ScrollView&) { }
@@ -308,7 +378,6 @@ void ListViewPeer::scrollExtentDidChange(ui::ScrollView&) { }
 void ListViewPeer::scrollToRow(
     ui::ListView& list, std::size_t index, ui::RowPosition position, bool /*animated*/)
 {
-    RowModel::complete(_rows.get(), static_cast<guint>(list.rowCount()));
     auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
     const double page = gtk_adjustment_get_page_size(adjustment), height = list.rowHeight();
     const double top = static_cast<double>(index) * height, now = gtk_adjustment_get_value(adjustment);
@@ -317,10 +386,26 @@ void ListViewPeer::scrollToRow(
         wanted = top;
     else if (position == ui::RowPosition::Middle)
         wanted = top - (page - height) / 2;
-    // The widgets of new rows are not laid out yet: the range is set by the model, which knows it.
-    gtk_adjustment_set_upper(adjustment,
-        std::max(gtk_adjustment_get_upper(adjustment), static_cast<double>(list.rowCount()) * height));
-    gtk_adjustment_set_value(adjustment, std::max(0.0, wanted));
+    moveTo(std::max(0.0, wanted), layoutFrames);
+}
+
+void ListViewPeer::focusRow(ui::ListView&, std::size_t index)
+{
+    focusSoon(index, focusFrames);
+}
+
+void ListViewPeer::focusSoon(std::size_t index, int frames)
+{
+    for (auto* item : _live) {
+        auto* place = gtk_widget_get_parent(gtk_list_item_get_child(item));
+        if (gtk_list_item_get_position(item) == index && place && gtk_widget_get_mapped(place)) {
+            gtk_widget_grab_focus(place);
+            return;
+        }
+    }
+    if (frames > 0)
+        context().scheduler().scheduleNextFrame(
+            &_focusKey, [this, index, frames] { focusSoon(index, frames - 1); });
 }
 
 void ListViewPeer::refreshStateDidChange(ui::ListView& list)

@@ -2,7 +2,9 @@
 
 #include "host/gtk/ViewPeer.h"
 #include "platform/ui/ListView.h"
+#include "platform/ui/TypeAhead.h"
 
+#include <optional>
 #include <unordered_set>
 
 namespace host::gtk {
@@ -23,6 +25,7 @@ public:
     void selectionDidChange(platform::ui::ListView& list) override;
     void scrollToRow(platform::ui::ListView& list, std::size_t index, platform::ui::RowPosition position,
         bool animated) override;
+    void focusRow(platform::ui::ListView& list, std::size_t index) override;
     void refreshStateDidChange(platform::ui::ListView& list) override;
 
     bool grabFocus() override;
@@ -39,6 +42,7 @@ private:
     void buildWidgets();
     void connectFactory(GtkListItemFactory* factory);
     void connectInput();
+    void connectMarks();
     void setUpRow(GtkListItem* item);
     void bindRow(GtkListItem* item);
     void activated(guint position);
@@ -46,16 +50,33 @@ private:
     /// Lets the widgets know of as many rows as a frame can make widgets for, and of more in the next frames.
     void showRows(std::size_t count);
     void growRows();
+    /// Scrolls, at the latest after so many frames.
+    void moveTo(double value, int frames);
     void refreshRowsLater();
     void refreshRows();
-    bool keyPressed(guint key, GdkModifierType modifiers);
     void showMenuOf(GtkWidget* row, double x, double y);
+    void showMenuOfList(double x, double y);
+    void held(GtkWidget* row, double x, double y);
+
+    // The keyboard.
+    bool keyPressed(guint key, GdkModifierType modifiers);
+    bool rowKeyPressed(std::size_t row, guint key, GdkModifierType modifiers);
+    bool listKeyPressed(guint key, GdkModifierType modifiers);
+    bool extendByKey(std::size_t from, guint key);
+    bool typedAhead(guint key, GdkModifierType modifiers);
+    GtkWidget* focusedRow() const;
+    GtkWidget* rowAt(double x, double y) const;
+    /// Gives the keyboard to a row as soon as it has a widget.
+    void focusSoon(std::size_t index, int frames);
 
     std::weak_ptr<platform::ui::ListView> _list;
     ObjectRef<GListModel> _rows;
     GtkWidget *_listWidget = nullptr, *_window = nullptr, *_refresher = nullptr, *_spinner = nullptr;
     std::unordered_set<GtkListItem*> _live;
     SignalConnection _onScroll;
+    platform::ui::TypeAhead _typeAhead;
+    int _focusKey = 0; ///< its address names the focusing of a row in the scheduler
+    int _scrollKey = 0; ///< its address names the second step of a scrolling in the scheduler
     int _growKey = 0; ///< its address names the growing of the list in the scheduler
     int _refreshKey = 0; ///< its address names the refreshing of rows in the scheduler
 };

@@ -1,10 +1,13 @@
 #include "platform/components/DocumentListController.h"
 
 #include "platform/Localization.h"
+#include "platform/components/DocumentPeek.h"
 #include "platform/components/DocumentRowSource.h"
 #include "platform/components/FolderContents.h"
+#include "platform/ui/AlertController.h"
 #include "platform/ui/ListView.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace platform::components {
@@ -77,6 +80,17 @@ void DocumentListController::setSelectedItems(const std::vector<Url>& items)
     selectionDidChange(*_listView);
 }
 
+void DocumentListController::selectAllItems()
+{
+    if (_editing && isViewLoaded())
+        _listView->selectAllByUser();
+}
+
+void DocumentListController::deselectAllItems()
+{
+    setSelectedItems({});
+}
+
 void DocumentListController::setEditingAnimated(bool editing, bool)
 {
     _editing = editing;
@@ -124,9 +138,9 @@ ui::Menu DocumentListController::menuForRow(ui::ListView&, std::size_t index)
     const auto rows = _rows->rows();
     if (_editing || !rows || index >= rows->count())
         return menu;
-    const bool isLibrary = rows->entry(index).kind == FolderEntryKind::Library;
+    const auto kind = rows->entry(index).kind;
     for (const auto& entry : menuEntries) {
-        if (!(_availableActions & actionBit(entry.action)) || (isLibrary && !entry.forLibraries))
+        if (!offers(entry.action, kind))
             continue;
         auto chosen = [weak = std::weak_ptr(self()), action = entry.action, url = rows->url(index)] {
             if (const auto list = weak.lock())
@@ -147,21 +161,64 @@ void DocumentListController::perform(DocumentListAction action, const Url& url)
             self(), static_cast<int>(action), url, _listView, {});
 }
 
-std::shared_ptr<ui::ViewController> DocumentListController::peekForRow(ui::ListView&, std::size_t index)
+bool DocumentListController::offers(DocumentListAction action, FolderEntryKind kind) const
+{
+    const auto* entry = std::ranges::find(menuEntries, action, &ActionEntry::action);
+    const bool isForKind =
+        entry == std::end(menuEntries) || entry->forLibraries || kind != FolderEntryKind::Library;
+    return isForKind && (_availableActions & actionBit(action)) != 0;
+}
+
+bool DocumentListController::rowCommand(ui::ListView& list, std::size_t index, ui::RowCommand command)
+{
+    if (command == ui::RowCommand::Peek)
+        return rowHeld(list, index);
+    constexpr std::pair<ui::RowCommand, DocumentListAction> actions[] = {
+        {ui::RowCommand::Rename, DocumentListAction::Rename},
+        {ui::RowCommand::Delete, DocumentListAction::Delete},
+        {ui::RowCommand::Info, DocumentListAction::Info},
+    };
+    const auto* action =
+        std::ranges::find(actions, command, &std::pair<ui::RowCommand, DocumentListAction>::first);
+    const auto rows = _rows->rows();
+    if (action == std::end(actions) || !rows || index >= rows->count()
+        || !offers(action->second, rows->entry(index).kind))
+        return false;
+    perform(action->second, rows->url(index));
+    return true;
+}
+
+bool DocumentListController::rowHeld(ui::ListView& list, std::size_t index)
 {
     const auto told = delegate();
     const auto rows = _rows->rows();
     if (!told || _editing || !rows || index >= rows->count())
-        return nullptr;
-    return told->documentListControllerViewControllerForPreviewingItemAtURL(self(), rows->url(index));
+        return false;
+    const auto url = rows->url(index);
+    const auto screen = told->documentListControllerViewControllerForPreviewingItemAtURL(self(), url);
+    if (!screen)
+        return false;
+    const auto open = [weak = std::weak_ptr(self()), url, kind = rows->entry(index).kind] {
+        if (const auto peeked = weak.lock())
+            peeked->openFromPeek(url, kind);
+    };
+    const auto title = _listView->row(index).title;
+    presentViewController(DocumentPeek::make(title, screen, menuForRow(list, index), open), true);
+    return true;
 }
 
-void DocumentListController::peekWasOpened(ui::ListView&, std::size_t index)
+void DocumentListController::openFromPeek(const Url& url, FolderEntryKind kind)
 {
-    const auto rows = _rows->rows();
-    const bool isOffered = _availableActions & actionBit(DocumentListAction::PressurePop);
-    if (isOffered && rows && index < rows->count())
-        perform(DocumentListAction::PressurePop, rows->url(index));
+    if (offers(DocumentListAction::PressurePop, kind))
+        perform(DocumentListAction::PressurePop, url);
+    else
+        open(url, kind);
+}
+
+void DocumentListController::selectionRequested(ui::ListView&)
+{
+    if (const auto told = delegate())
+        told->documentListControllerRequestsEditing(self());
 }
 
 void DocumentListController::openOutOfDriveViewControllerAction(

@@ -58,6 +58,10 @@ public:
     /// URLs that are no items of the list are ignored. Only an editing list selects.
     void setSelectedItems(const std::vector<Url>& items);
 
+    /// Selects every item, which makes no URL; the delegate is told.
+    void selectAllItems();
+    void deselectAllItems();
+
     bool editing() const { return _editing; }
     /// While editing, taps toggle check marks and nothing is opened. Leaving it clears the selection.
     void setEditingAnimated(bool editing, bool animated);
@@ -104,8 +108,9 @@ private:
     void visibleRowsDidChange(ui::ListView& list, ui::RowRange range) override;
     void selectionDidChange(ui::ListView& list) override;
     void refreshRequested(ui::ListView& list) override;
-    std::shared_ptr<ui::ViewController> peekForRow(ui::ListView& list, std::size_t index) override;
-    void peekWasOpened(ui::ListView& list, std::size_t index) override;
+    bool rowCommand(ui::ListView& list, std::size_t index, ui::RowCommand command) override;
+    bool rowHeld(ui::ListView& list, std::size_t index) override;
+    void selectionRequested(ui::ListView& list) override;
 
     std::shared_ptr<DocumentListController> self();
     void contentsDidChange(const FolderContentsUpdate& update);
@@ -114,6 +119,9 @@ private:
     void reportRemovalIfShown();
     void open(const Url& url, FolderEntryKind kind);
     void perform(DocumentListAction action, const Url& url);
+    void openFromPeek(const Url& url, FolderEntryKind kind);
+    /// Whether an item may be done something to: the action is enabled, and its kind of item has it.
+    bool offers(DocumentListAction action, FolderEntryKind kind) const;
 
     std::optional<Url> _presentedURL;
     std::weak_ptr<DocumentListControllerDelegate> _delegate;

@@ -36,6 +36,10 @@ public:
     /// The folder that the list shows is gone. Called once, and only while the list is shown.
     virtual void documentListControllerURLWasRemoved(const List&) { }
 
+    /// The user began to choose several items by the keyboard (select all, a range): enter edit mode if it is
+    /// offered. The list goes on once it is editing.
+    virtual void documentListControllerRequestsEditing(const List&) { }
+
     /// The screen for a peek at an item; null: none.
     virtual std::shared_ptr<ui::ViewController> documentListControllerViewControllerForPreviewingItemAtURL(
         const List&, const Url&)

@@ -63,6 +63,12 @@ ui::RowId DocumentRowSource::rowIdAtIndex(const ui::ListView&, std::size_t index
     return _rows->ids()[index];
 }
 
+std::optional<std::size_t> DocumentRowSource::rowBeginningWith(
+    const ui::ListView&, std::string_view text, std::size_t from) const
+{
+    return _rows ? _rows->rowBeginningWith(text, from) : std::nullopt;
+}
+
 ui::ListRow DocumentRowSource::rowAtIndex(const ui::ListView&, std::size_t index) const
 {
     const auto entry = _rows->entry(index);

@@ -45,6 +45,8 @@ public:
     std::size_t numberOfRows(const ui::ListView& list) const override;
     ui::ListRow rowAtIndex(const ui::ListView& list, std::size_t index) const override;
     ui::RowId rowIdAtIndex(const ui::ListView& list, std::size_t index) const override;
+    std::optional<std::size_t> rowBeginningWith(
+        const ui::ListView& list, std::string_view text, std::size_t from) const override;
 
 private:
     struct Known {

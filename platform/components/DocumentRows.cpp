@@ -104,6 +104,18 @@ ui::RowId DocumentRows::idFor(const Url& url) const
     return isInFolder ? idOfName(url.lastPathComponent()) : idOfExtraItem(url);
 }
 
+std::optional<std::size_t> DocumentRows::rowBeginningWith(std::string_view text, std::size_t from) const
+{
+    const auto same = [](char a, char b) { return folded(a) == folded(b); };
+    for (std::size_t step = 0; step < count(); ++step) {
+        const auto row = (from + step) % count();
+        const auto name = entry(row).name;
+        if (name.size() >= text.size() && std::equal(text.begin(), text.end(), name.begin(), same))
+            return row;
+    }
+    return std::nullopt;
+}
+
 ui::ListChanges DocumentRows::changes(const DocumentRows& before, const DocumentRows& after)
 {
     auto changes = ui::ListChanges::between(before.ids(), after.ids());

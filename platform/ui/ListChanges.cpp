@@ -51,7 +51,37 @@ void keepLongestRise(std::vector<std::size_t>& old)
     }
 }
 
+/// Makes a splice reach to the end of a later one; the rows between them go and come again.
+void extend(ListSplice& splice, const ListSplice& later)
+{
+    const auto between = later.position - (splice.position + splice.inserted);
+    splice.removed += between + later.removed;
+    splice.inserted += between + later.inserted;
+}
+
 } // namespace
+
+std::vector<ListSplice> ListChanges::splicesExactWithin(const RowRange& range) const
+{
+    enum class Place { Before, Within, Behind };
+    std::vector<ListSplice> merged;
+    auto last = Place::Within;
+    std::size_t removed = 0, inserted = 0; // by the splices so far
+    for (const auto& splice : splices) {
+        const auto begin = splice.position + removed - inserted; // in the list as it was
+        auto place = begin >= range.end() ? Place::Behind : Place::Within;
+        if (begin + splice.removed <= range.first)
+            place = Place::Before;
+        removed += splice.removed;
+        inserted += splice.inserted;
+        if (place == Place::Within || place != last)
+            merged.push_back(splice);
+        else
+            extend(merged.back(), splice);
+        last = place;
+    }
+    return merged;
+}
 
 ListChanges ListChanges::between(std::span<const RowId> before, std::span<const RowId> after)
 {

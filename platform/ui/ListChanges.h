@@ -33,6 +33,10 @@ struct ListChanges {
 
     bool isEmpty() const { return splices.empty() && changed.empty(); }
 
+    /// The same way in fewer steps: what lies before the rows of a range (of the list as it was) is one
+    /// splice, what lies behind them another; those at the rows themselves stay as they are.
+    std::vector<ListSplice> splicesExactWithin(const RowRange& range) const;
+
     /// The shortest way from one order of rows to another: what is in both orders and keeps its sequence
     /// stays, what moves is removed and inserted. Identifiers are unique within an order. n log n.
     static ListChanges between(std::span<const RowId> before, std::span<const RowId> after);

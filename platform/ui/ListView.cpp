@@ -1,6 +1,5 @@
 #include "platform/ui/ListView.h"
 
-#include "platform/ui/ViewController.h"
 #include "platform/ui/ViewVisitor.h"
 
 #include <algorithm>
@@ -95,6 +94,14 @@ void ListView::scrollToRow(std::size_t index, RowPosition position, bool animate
         [&](ListViewObserver& observer) { observer.scrollToRow(*this, index, position, animated); });
 }
 
+void ListView::focusRow(std::size_t index)
+{
+    if (!isItem(index))
+        return;
+    scrollToRow(index, RowPosition::Nearest, false);
+    _listObserver.notify([&](ListViewObserver& observer) { observer.focusRow(*this, index); });
+}
+
 void ListView::setSelectionMode(SelectionMode mode)
 {
     if (mode == _selectionMode)
@@ -164,12 +171,29 @@ void ListView::activateRow(std::size_t index)
     }
 }
 
+bool ListView::enterSelectionMode()
+{
+    if (_selectionMode == SelectionMode::Multiple)
+        return true;
+    if (const auto delegate = _listDelegate.lock())
+        delegate->selectionRequested(*this);
+    return _selectionMode == SelectionMode::Multiple;
+}
+
 void ListView::extendSelectionTo(std::size_t index)
 {
-    if (_selectionMode != SelectionMode::Multiple || !isItem(index))
+    if (!isItem(index) || !enterSelectionMode())
         return;
     const auto ids = rowIds();
     _selection.extendTo(_dataSource.lock()->rowIdAtIndex(*this, index), ids);
+    selectionChangedByUser();
+}
+
+void ListView::selectAllByUser()
+{
+    if (!enterSelectionMode())
+        return;
+    _selection.selectAll(rowIds());
     selectionChangedByUser();
 }
 
@@ -188,6 +212,32 @@ Menu ListView::menuForRow(std::size_t index)
     return delegate->menuForRow(*this, index);
 }
 
+Menu ListView::menuForList()
+{
+    const auto delegate = _listDelegate.lock();
+    return delegate ? delegate->menuForList(*this) : Menu();
+}
+
+bool ListView::commandRow(std::size_t index, RowCommand command)
+{
+    const auto delegate = _listDelegate.lock();
+    return delegate && isItem(index) && _selectionMode == SelectionMode::None
+        && delegate->rowCommand(*this, index, command);
+}
+
+bool ListView::holdRow(std::size_t index)
+{
+    const auto delegate = _listDelegate.lock();
+    return delegate && isItem(index) && _selectionMode == SelectionMode::None
+        && delegate->rowHeld(*this, index);
+}
+
+std::optional<std::size_t> ListView::rowBeginningWith(std::string_view text, std::size_t from) const
+{
+    const auto source = _dataSource.lock();
+    return source ? source->rowBeginningWith(*this, text, from) : std::nullopt;
+}
+
 void ListView::pulledToRefresh()
 {
     const auto delegate = _listDelegate.lock();
@@ -195,20 +245,6 @@ void ListView::pulledToRefresh()
         return;
     _refreshing = true;
     delegate->refreshRequested(*this);
-}
-
-std::shared_ptr<ViewController> ListView::peekAtRow(std::size_t index)
-{
-    const auto delegate = _listDelegate.lock();
-    if (!delegate || !isItem(index) || _selectionMode == SelectionMode::Multiple)
-        return nullptr;
-    return delegate->peekForRow(*this, index);
-}
-
-void ListView::openPeek(std::size_t index)
-{
-    if (const auto delegate = _listDelegate.lock(); delegate && isItem(index))
-        delegate->peekWasOpened(*this, index);
 }
 
 void ListView::layoutSubviews()

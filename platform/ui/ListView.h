@@ -36,6 +36,7 @@ public:
     void apply(const ListChanges& changes);
     void rowChanged(std::size_t index);
     void scrollToRow(std::size_t index, RowPosition position, bool animated);
+    void focusRow(std::size_t index); ///< scrolls there if need be; the row takes the keyboard
 
     SelectionMode selectionMode() const { return _selectionMode; }
     void setSelectionMode(SelectionMode mode); ///< leaving selection mode clears the selection
@@ -51,11 +52,16 @@ public:
 
     // Events up. An index that is past the end, as a late event may bring it, is ignored.
     void activateRow(std::size_t index); ///< opens the row, or toggles it in selection mode
+    /// The range from the row touched last. Out of selection mode the delegate is asked for it first.
     void extendSelectionTo(std::size_t index);
+    void selectAllByUser();
     Menu menuForRow(std::size_t index);
+    Menu menuForList();
+    bool commandRow(std::size_t index, RowCommand command);
+    bool holdRow(std::size_t index);
+    /// The row that what was typed leads to, see ListViewDataSource::rowBeginningWith().
+    std::optional<std::size_t> rowBeginningWith(std::string_view text, std::size_t from) const;
     void pulledToRefresh();
-    std::shared_ptr<ViewController> peekAtRow(std::size_t index);
-    void openPeek(std::size_t index);
 
     void layoutSubviews() override;
 
@@ -68,6 +74,7 @@ private:
     void rowCountDidChange();
     bool isItem(std::size_t index) const;
     void selectionChangedByUser();
+    bool enterSelectionMode();
 
     std::weak_ptr<ListViewDataSource> _dataSource;
     std::weak_ptr<ListViewDelegate> _listDelegate;

@@ -2,6 +2,9 @@
 
 #include "platform/ui/ListChanges.h"
 
+#include <optional>
+#include <string_view>
+
 namespace platform::ui {
 
 class ListView;
@@ -19,6 +22,13 @@ public:
     /// The same identifier and kind that `rowAtIndex` answers, without making the row.
     virtual RowId rowIdAtIndex(const ListView& list, std::size_t index) const = 0;
     virtual RowKind rowKindAtIndex(const ListView&, std::size_t /*index*/) const { return RowKind::Item; }
+    /// For typing ahead: the first row at or after `from`, and then from the top, whose name begins with a
+    /// text, whatever its case; nothing when none does.
+    virtual std::optional<std::size_t> rowBeginningWith(
+        const ListView&, std::string_view /*text*/, std::size_t /*from*/) const
+    {
+        return std::nullopt;
+    }
 };
 
 } // namespace platform::ui

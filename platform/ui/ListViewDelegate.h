@@ -3,12 +3,14 @@
 #include "platform/ui/ListChanges.h"
 #include "platform/ui/Menu.h"
 
-#include <memory>
+#include <cstddef>
 
 namespace platform::ui {
 
 class ListView;
-class ViewController;
+
+/// What the keyboard asks for at a row, beside to open it.
+enum class RowCommand { Rename, Delete, Info, Peek };
 
 /// Is told what the user does with a list. Main thread only.
 class ListViewDelegate {
@@ -19,6 +21,13 @@ public:
     virtual void rowActivated(ListView&, std::size_t /*index*/) { }
     /// The entries of the menu that a long press or the second mouse button asks for; empty: no menu.
     virtual Menu menuForRow(ListView&, std::size_t /*index*/) { return {}; }
+    /// The entries of the menu for the list itself, away from any row; empty: no menu.
+    virtual Menu menuForList(ListView&) { return {}; }
+    /// A key of the row's; false: it means nothing here.
+    virtual bool rowCommand(ListView&, std::size_t /*index*/, RowCommand) { return false; }
+    /// The user began to select by the keyboard while the list was not in selection mode. Answer by entering
+    /// it, or not at all.
+    virtual void selectionRequested(ListView&) { }
     /// Other rows are visible now, or other rows stand there: begin to fetch their details, cancel those of
     /// the rest.
     virtual void visibleRowsDidChange(ListView&, RowRange) { }
@@ -27,10 +36,9 @@ public:
     /// The list was pulled down to be refreshed; answer with `ListView::endRefreshing`.
     virtual void refreshRequested(ListView& list);
 
-    /// The screen for a peek at a row; null: none.
-    virtual std::shared_ptr<ViewController> peekForRow(ListView&, std::size_t /*index*/) { return nullptr; }
-    /// The user went on from the peek.
-    virtual void peekWasOpened(ListView&, std::size_t /*index*/) { }
+    /// A row is held: show what it has to say, over the list. False: there is nothing, and the row's menu
+    /// is shown instead.
+    virtual bool rowHeld(ListView&, std::size_t /*index*/) { return false; }
 };
 
 } // namespace platform::ui

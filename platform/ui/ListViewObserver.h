@@ -20,6 +20,8 @@ public:
     /// Check marks of the visible rows have to be shown anew.
     virtual void selectionDidChange(ListView& list) = 0;
     virtual void scrollToRow(ListView& list, std::size_t index, RowPosition position, bool animated) = 0;
+    /// Scrolls to a row and gives it the keyboard.
+    virtual void focusRow(ListView& list, std::size_t index) = 0;
     /// Refreshing has ended, or may be asked for or not.
     virtual void refreshStateDidChange(ListView& list) = 0;
 };

@@ -4,16 +4,22 @@
 
 namespace platform::ui {
 
+void SelectionModel::touch(RowId id)
+{
+    _anchor = id;
+    _range.reset();
+}
+
 void SelectionModel::select(RowId id)
 {
     _ids.insert(id);
-    _anchor = id;
+    touch(id);
 }
 
 void SelectionModel::deselect(RowId id)
 {
     _ids.erase(id);
-    _anchor = id;
+    touch(id);
 }
 
 bool SelectionModel::toggle(RowId id)
@@ -28,13 +34,14 @@ bool SelectionModel::toggle(RowId id)
 
 void SelectionModel::selectOnly(RowId id)
 {
-    _ids = {id};
-    _anchor = id;
+    _ids.clear();
+    select(id);
 }
 
 void SelectionModel::selectAll(std::span<const RowId> order)
 {
-    _ids.insert(order.begin(), order.end());
+    _ids.insert(order);
+    _range.reset();
 }
 
 void SelectionModel::extendTo(RowId id, std::span<const RowId> order)
@@ -47,14 +54,21 @@ void SelectionModel::extendTo(RowId id, std::span<const RowId> order)
         return select(id);
     if (last < first)
         std::swap(first, last);
-    // The start of the range stays, so that the next range begins at the same row.
-    _ids.insert(first, last + 1);
+    if (!_range)
+        _range = Range{_ids, contains(*_anchor)};
+    _ids = _range->before;
+    const std::span<const RowId> range(first, last + 1);
+    if (_range->selects)
+        _ids.insert(range);
+    else
+        std::ranges::for_each(range, [this](RowId row) { _ids.erase(row); });
 }
 
 void SelectionModel::clear()
 {
     _ids.clear();
     _anchor.reset();
+    _range.reset();
 }
 
 bool SelectionModel::keepOnly(std::span<const RowId> order)
@@ -62,12 +76,14 @@ bool SelectionModel::keepOnly(std::span<const RowId> order)
     if (_ids.empty())
         return false;
     const auto before = _ids.size();
-    std::unordered_set<RowId> kept;
+    RowIdSet kept;
     for (const auto id : order) {
         if (_ids.contains(id))
             kept.insert(id);
     }
     _ids = std::move(kept);
+    // What was selected before the range may hold rows that are gone.
+    _range.reset();
     return _ids.size() != before;
 }
 

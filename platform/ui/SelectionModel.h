@@ -1,11 +1,10 @@
 #pragma once
 
-#include "platform/ui/ListRow.h"
+#include "platform/ui/RowIdSet.h"
 
 #include <cstddef>
 #include <optional>
 #include <span>
-#include <unordered_set>
 #include <vector>
 
 namespace platform::ui {
@@ -24,8 +23,9 @@ public:
     bool toggle(RowId id);
     void selectOnly(RowId id);
     void selectAll(std::span<const RowId> order);
-    /// Adds everything from the row touched last to this one, both included; only this one when there is no
-    /// such row.
+    /// Makes everything from the row touched last to this one, both included, what the row touched last is:
+    /// selected or not. A further call replaces the range of the one before. Without such a row this one
+    /// alone is selected.
     void extendTo(RowId id, std::span<const RowId> order);
     void clear();
 
@@ -37,8 +37,16 @@ public:
     bool operator==(const SelectionModel& other) const { return _ids == other._ids; }
 
 private:
-    std::unordered_set<RowId> _ids;
+    /// A range that is being drawn, and what was selected before it.
+    struct Range {
+        RowIdSet before;
+        bool selects;
+    };
+    void touch(RowId id);
+
+    RowIdSet _ids;
     std::optional<RowId> _anchor; ///< the row touched last
+    std::optional<Range> _range;
 };
 
 } // namespace platform::ui

@@ -1,8 +1,11 @@
 #include "browser/NavController.h"
 #include "browser/PeekFolderViewController.h"
+#include "platform/Localization.h"
 #include "platform/components/DocumentListAction.h"
 #include "platform/components/DocumentListController.h"
 #include "platform/ui/AlertController.h"
+#include "platform/ui/ListView.h"
+#include "platform/ui/NavigationItem.h"
 #include "platform/ui/SearchPresentation.h"
 #include "platform/ui/View.h"
 #include "platform/ui/Window.h"
@@ -298,6 +301,63 @@ TEST_F(NavigationTest, APopOpensWhatWasPeekedAt)
     EXPECT_EQ(search(), nullptr);
     EXPECT_THAT(stack(), ElementsAre(top, "Folder", "Sub", "*"))
         << "what was searched for is shown in its real place";
+}
+
+TEST_F(NavigationTest, WhileItemsAreChosenNothingOpens)
+{
+    write("Folder/a.txt");
+    write("note.txt");
+    launch();
+    tapFolder(url("Folder"));
+    browser->popViewController(false);
+    settle();
+    auto& bar = topList()->navigationItem();
+    ASSERT_EQ(bar.rightItems().size(), 1U);
+    EXPECT_EQ(bar.rightItems().front()->title(), platform::localized("Select"));
+    log->clear();
+    EXPECT_TRUE(bar.rightItems().front()->press());
+    EXPECT_TRUE(browser->editMode());
+    EXPECT_TRUE(topList()->editing());
+    EXPECT_TRUE(bar.hidesBackButton());
+    EXPECT_EQ(topList()->title(), platform::localized("Select Items"));
+
+    tapFolder(url("Folder"));
+    tap(url("note.txt"));
+    EXPECT_THAT(stack(), ElementsAre(top));
+    EXPECT_EQ(log->count("WARNING DLC Navigation not allowed while in edit mode"), 1);
+    EXPECT_EQ(log->count("DEBUG DLC Selection not allowed while in edit mode"), 1);
+
+    browser->selectAllItems(nullptr);
+    EXPECT_EQ(topList()->selectedItemCount(), topList()->containedItemCount());
+    EXPECT_EQ(topList()->title(),
+        platform::localizedPlural(
+            ".DICT.ITEMS_SELECTED.%d", {static_cast<std::int64_t>(topList()->containedItemCount())}));
+    EXPECT_EQ(
+        log->count("DEBUG DLC selected item count is " + std::to_string(topList()->selectedItemCount())), 1);
+
+    EXPECT_TRUE(bar.rightItems().front()->press());
+    EXPECT_FALSE(browser->editMode());
+    EXPECT_EQ(topList()->selectedItemCount(), 0U);
+    EXPECT_NE(topList()->title(), platform::localized("Select Items"));
+    EXPECT_THAT(log->activities(),
+        testing::IsSupersetOf(
+            {"Pressed Select (begin edit)", "Pressed SelectAll", "Pressed Cancel (end edit)"}));
+}
+
+TEST_F(NavigationTest, AListThatIsNotEditingEndsEditMode)
+{
+    write("Folder/a.txt");
+    launch();
+    tapFolder(url("Folder"));
+    topList()->selectAllItems();
+    EXPECT_EQ(topList()->selectedItemCount(), 0U);
+    topList()->listView()->selectAllByUser(); // the keyboard begins edit mode
+    EXPECT_TRUE(browser->editMode());
+    EXPECT_EQ(topList()->selectedItemCount(), 1U);
+    browser->popViewController(false);
+    settle();
+    EXPECT_FALSE(browser->editMode());
+    EXPECT_EQ(topList()->navigationItem().rightItems().front()->title(), platform::localized("Select"));
 }
 
 TEST_F(NavigationTest, ADocumentOpensInTheAppThatOwnsItAndElseInThePreview)

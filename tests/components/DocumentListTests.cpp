@@ -5,6 +5,7 @@
 #include "platform/Localization.h"
 #include "platform/components/PlaceholderView.h"
 #include "platform/components/UnavailableScreen.h"
+#include "platform/ui/AlertController.h"
 #include "platform/ui/ListView.h"
 #include "platform/ui/ListViewObserver.h"
 #include "platform/ui/NavigationItem.h"
@@ -37,6 +38,7 @@ struct RecordingListObserver : ui::ListViewObserver {
     void rowDidChange(ui::ListView&, std::size_t index) override { changedRows.push_back(index); }
     void selectionDidChange(ui::ListView&) override { }
     void scrollToRow(ui::ListView&, std::size_t, ui::RowPosition, bool) override { }
+    void focusRow(ui::ListView&, std::size_t) override { }
     void refreshStateDidChange(ui::ListView&) override { }
 
     int resets = 0;
@@ -157,15 +159,97 @@ TEST_F(DocumentList, OffersTheEnabledActionsWithTheirCodes)
     list->setAvailableActions(125);
     for (const auto& entry : list->listView()->menuForRow(1))
         entry.handler();
-    list->listView()->openPeek(1);
     EXPECT_EQ(delegate->take(),
         (Lines{"action 2 Notes.txt", "action 4 Notes.txt", "action 3 Notes.txt", "action 5 Notes.txt",
-            "action 0 Notes.txt", "action 6 Notes.txt"}));
+            "action 0 Notes.txt"}));
 
     Lines titlesOfLibrary;
     for (const auto& entry : list->listView()->menuForRow(0))
         titlesOfLibrary.push_back(entry.title);
     EXPECT_EQ(titlesOfLibrary, (Lines{"Info", "Share", "Delete"}));
+}
+
+TEST_F(DocumentList, AnswersTheKeysOfItsRows)
+{
+    makePaintLibrary(drive);
+    const auto list = shownList(*DocumentListController::createRootList()->presentedURL());
+    deliver(list, {{"Notes.txt"}});
+    list->setAvailableActions(125 & ~actionBit(DocumentListAction::Delete));
+    delegate->take();
+    const struct {
+        std::size_t row;
+        ui::RowCommand command;
+        Lines told;
+    } rows[] = {
+        {1, ui::RowCommand::Rename, {"action 3 Notes.txt"}},
+        {1, ui::RowCommand::Info, {"action 2 Notes.txt"}},
+        {1, ui::RowCommand::Delete, {}}, // not enabled
+        {1, ui::RowCommand::Peek, {}}, // nothing to show
+        {0, ui::RowCommand::Rename, {}}, // not for a library
+        {7, ui::RowCommand::Info, {}},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ(list->listView()->commandRow(row.row, row.command), !row.told.empty());
+        EXPECT_EQ(delegate->take(), row.told);
+    }
+}
+
+TEST_F(DocumentList, AHeldRowShowsItsScreenWithWhatCanBeDoneWithIt)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    deliver(list, {{"a.txt"}, {"b.txt"}});
+    list->setAvailableActions(125);
+    delegate->take();
+    delegate->preview = std::make_shared<ui::ViewController>();
+    const auto peek = [&] {
+        EXPECT_TRUE(list->listView()->commandRow(1, ui::RowCommand::Peek));
+        drive.dispatch->runUntilIdle();
+        return std::dynamic_pointer_cast<ui::AlertController>(list->presentedViewController());
+    };
+    auto shown = peek();
+    ASSERT_TRUE(shown);
+    EXPECT_EQ(shown->title(), "b.txt");
+    shown->view();
+    EXPECT_TRUE(delegate->preview->parent());
+    shown->userCancelled();
+    EXPECT_FALSE(list->presentedViewController());
+    EXPECT_EQ(delegate->take(), Lines{});
+
+    shown = peek();
+    shown->view();
+    shown->press(shown->preferredAction());
+    EXPECT_EQ(delegate->take(), Lines{"action 6 b.txt"});
+    EXPECT_FALSE(delegate->preview->parent());
+
+    list->setAvailableActions(actionBit(DocumentListAction::Info));
+    shown = peek();
+    EXPECT_EQ(shown->actions().size(), 3U); // open, info, cancel
+    shown->press(shown->preferredAction());
+    EXPECT_EQ(delegate->take(), Lines{"item b.txt"});
+
+    list->setEditingAnimated(true, false);
+    EXPECT_FALSE(list->listView()->holdRow(1));
+}
+
+TEST_F(DocumentList, SelectingByTheKeyboardAsksForEditMode)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    deliver(list, {{"a"}, {"b"}, {"c"}, {"d"}});
+    delegate->take();
+    list->listView()->selectAllByUser();
+    EXPECT_EQ(list->selectedItemCount(), 0U);
+    EXPECT_EQ(delegate->take(), Lines{"wants to select"});
+
+    delegate->allowsEditing = true;
+    list->listView()->extendSelectionTo(1);
+    list->listView()->extendSelectionTo(3);
+    EXPECT_EQ(list->selectedItemCount(), 3U);
+    list->listView()->extendSelectionTo(0);
+    EXPECT_EQ(list->selectedItems(), (std::vector{drive.url("Stuff/a"), drive.url("Stuff/b")}));
+    list->selectAllItems();
+    EXPECT_EQ(list->selectedItemCount(), 4U);
+    list->deselectAllItems();
+    EXPECT_EQ(list->selectedItemCount(), 0U);
 }
 
 TEST_F(DocumentList, SelectsWhileEditingAndKeepsTheSelectionThroughChanges)

@@ -219,7 +219,18 @@ public:
     }
     ui::RowId rowIdAtIndex(const ui::ListView&, std::size_t index) const override { return ids[index]; }
     void rowActivated(ui::ListView&, std::size_t index) override { activated.push_back(ids[index]); }
+    bool rowHeld(ui::ListView&, std::size_t index) override
+    {
+        held.push_back(ids[index]);
+        return true;
+    }
+    ui::Menu menuForRow(ui::ListView&, std::size_t index) override
+    {
+        menus.push_back(ids[index]);
+        return {};
+    }
 
+    std::vector<ui::RowId> held, menus;
     std::vector<ui::RowId> ids;
     std::map<ui::RowId, std::string> titles;
     std::vector<ui::RowId> activated;
@@ -305,6 +316,54 @@ TEST_F(ListTests, ATapOpensAndInSelectionModeMarks)
     EXPECT_THAT(rows->activated, ElementsAre(3U));
     EXPECT_THAT(list->selection().inOrder(list->rowIds()), ElementsAre(4U));
     expectRowsMatch();
+}
+
+TEST_F(ListTests, ManyChangesElsewhereKeepThePlaceAndTheFocus)
+{
+    showRows(5000);
+    list->scrollToRow(2500, ui::RowPosition::Top, false);
+    settle();
+    EXPECT_EQ(list->visibleRows().first, 2500U);
+    list->focusRow(2503);
+    const auto focusedId = [this] {
+        auto* focused = gtk_root_get_focus(gtk_widget_get_root(listPeer().listWidget()));
+        auto* row = focused ? gtk_widget_get_first_child(focused) : nullptr;
+        const bool isRow = row && host::gtk::ListRowWidget::isRow(row);
+        return isRow ? host::gtk::ListRowWidget::shown(row).id : 0;
+    };
+    waitFor([&] { return focusedId() == 2504; }, "the focus to come to the row");
+    EXPECT_EQ(list->visibleRows().first, 2500U);
+    std::vector<ui::RowId> after;
+    for (ui::RowId id = 1; id <= 5000; ++id) {
+        after.push_back(id);
+        const bool isNear = id > 2490 && id < 2520;
+        if (id % 2 == 0 && !isNear)
+            after.push_back(100'000 + id);
+        if (id % 3 == 0 && !isNear)
+            after.pop_back();
+    }
+    change(after);
+    expectRowsMatch();
+    EXPECT_EQ(focusedId(), 2504U);
+    const auto first = list->visibleRows().first;
+    EXPECT_NEAR(static_cast<double>(rows->ids[first]), 2501, 1);
+
+    std::erase(after, 2504U);
+    change(after);
+    waitFor([&] { return focusedId() == 2505; }, "the focus to come to the row behind");
+}
+
+TEST_F(ListTests, AssistiveTechnologyCanOpenAskForTheMenuAndPeek)
+{
+    showRows(4);
+    for (auto* row : listPeer().liveRows()) {
+        for (const char* action : {"row.activate", "row.menu", "row.peek"})
+            EXPECT_TRUE(gtk_widget_activate_action(row, action, nullptr));
+    }
+    settle();
+    EXPECT_EQ(rows->activated.size(), 4U);
+    EXPECT_EQ(rows->menus, rows->activated);
+    EXPECT_EQ(rows->held, rows->activated);
 }
 
 TEST_F(ListTests, AHundredThousandRowsCostWhatIsNearTheVisibleOnes)

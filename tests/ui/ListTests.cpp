@@ -1,7 +1,9 @@
 #include "platform/ui/ListView.h"
+#include "platform/ui/TypeAhead.h"
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <numeric>
 #include <ostream>
 #include <random>
@@ -131,6 +133,89 @@ TEST_F(List, TapsOpenOrSelectAndLateOnesAreIgnored)
     EXPECT_EQ(list->selection().count(), 14);
     list->setSelectionMode(SelectionMode::None);
     EXPECT_TRUE(list->selection().isEmpty());
+}
+
+TEST_F(List, ARangeIsRedrawnUntilAnotherRowIsTouched)
+{
+    Ids order(40);
+    std::iota(order.begin(), order.end(), 0);
+    SelectionModel selection;
+    selection.toggle(2);
+    selection.toggle(10);
+    selection.extendTo(14, order);
+    EXPECT_EQ(selection.inOrder(order), (Ids{2, 10, 11, 12, 13, 14}));
+    selection.extendTo(8, order);
+    EXPECT_EQ(selection.inOrder(order), (Ids{2, 8, 9, 10}));
+    selection.toggle(10); // off: a range from here deselects
+    selection.extendTo(2, order);
+    EXPECT_TRUE(selection.isEmpty());
+    selection.extendTo(9, order);
+    EXPECT_EQ(selection.inOrder(order), (Ids{2, 8}));
+
+    selection.selectAll(order);
+    EXPECT_EQ(selection.count(), order.size());
+    for (RowId id = 0; id < 40; id += 2)
+        selection.deselect(id);
+    for (RowId id = 0; id < 40; ++id)
+        EXPECT_EQ(selection.contains(id), id % 2 == 1) << id;
+    EXPECT_TRUE(selection.keepOnly(std::span(order).first(20)));
+    EXPECT_EQ(selection.count(), 10);
+    EXPECT_FALSE(selection.keepOnly(order));
+}
+
+TEST_F(List, ManyChangesAreFewAwayFromWhatIsSeen)
+{
+    std::mt19937 random(7);
+    for (int round = 0; round < 200; ++round) {
+        Ids before, after;
+        for (RowId id = 0; id < 300; ++id) {
+            if (random() % 3)
+                before.push_back(id);
+            if (random() % 3)
+                after.push_back(id);
+        }
+        const RowRange seen{random() % before.size(), 10};
+        const auto changes = ListChanges::between(before, after);
+        const auto few = changes.splicesExactWithin(seen);
+        EXPECT_EQ(applied(before, {few, {}}, after), after);
+        EXPECT_LE(few.size(), seen.count + 3);
+        // What is seen and stays is in no splice.
+        std::size_t grown = 0, shrunk = 0;
+        for (const auto& splice : few) {
+            const auto first = splice.position + shrunk - grown;
+            for (auto row = first; row < first + splice.removed; ++row) {
+                const bool isSeen = seen.contains(row) && row < before.size();
+                EXPECT_FALSE(isSeen && std::ranges::binary_search(after, before[row]));
+            }
+            grown += splice.inserted;
+            shrunk += splice.removed;
+        }
+    }
+}
+
+TEST_F(List, TypingAheadGathersATextAndRepeatsALetter)
+{
+    const struct {
+        const char* typed;
+        double at; ///< seconds
+        const char* sought;
+        std::size_t start; ///< with the keyboard at row 5
+    } rows[] = {
+        {"n", 0, "n", 6},
+        {"n", 0.3, "n", 6},
+        {"o", 0.6, "nno", 5},
+        {"a", 3, "a", 6},
+        {"b", 3.5, "ab", 5},
+        {"\xC3\xA4", 9, "\xC3\xA4", 6},
+        {"\xC3\xA4", 9.1, "\xC3\xA4", 6},
+    };
+    TypeAhead text;
+    for (const auto& row : rows) {
+        text.type(row.typed, Date::fromSeconds(1000 + row.at));
+        EXPECT_EQ(text.sought(), row.sought);
+        EXPECT_EQ(text.start(5), row.start);
+    }
+    EXPECT_FALSE(text.isActive(Date::fromSeconds(1020)));
 }
 
 TEST_F(List, RefreshesOnceAtATime)

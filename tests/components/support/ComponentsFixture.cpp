@@ -63,6 +63,13 @@ void RecordingListDelegate::documentListControllerPerformActionURLOriginatingVie
     _lines.push_back("action " + std::to_string(action) + " " + url.lastPathComponent());
 }
 
+void RecordingListDelegate::documentListControllerRequestsEditing(const List& list)
+{
+    _lines.push_back("wants to select");
+    if (allowsEditing)
+        list->setEditingAnimated(true, false);
+}
+
 std::vector<std::string> RecordingListDelegate::take()
 {
     return std::exchange(_lines, {});

@@ -85,7 +85,17 @@ public:
         const platform::Url& url, const std::shared_ptr<platform::ui::View>& view,
         const Completion& completion) override;
 
+    void documentListControllerRequestsEditing(const List& list) override;
+    std::shared_ptr<platform::ui::ViewController> documentListControllerViewControllerForPreviewingItemAtURL(
+        const List&, const platform::Url&) override
+    {
+        return preview;
+    }
+
     std::vector<std::string> take();
+
+    std::shared_ptr<platform::ui::ViewController> preview; ///< what a peek shows
+    bool allowsEditing = false;
 
 private:
     std::vector<std::string> _lines;

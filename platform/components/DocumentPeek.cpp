@@ -1,0 +1,82 @@
+#include "platform/components/DocumentPeek.h"
+
+#include "platform/Localization.h"
+#include "platform/ui/AlertController.h"
+#include "platform/ui/View.h"
+
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+/// Holds the peeked screen in a place of fixed height.
+class Miniature : public ui::ViewController {
+public:
+    explicit Miniature(std::shared_ptr<ui::ViewController> screen)
+        : _screen(std::move(screen))
+    {
+    }
+
+    void loadView() override
+    {
+        const auto place = std::make_shared<ui::View>();
+        place->setPlacedByFrame(false);
+        setView(place);
+        addChildViewController(_screen);
+        const auto& content = _screen->view();
+        content->setPlacedByFrame(true);
+        content->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
+        content->setFrame(place->bounds());
+        place->addSubview(content);
+        _screen->didMoveToParentViewController(shared_from_this());
+        ui::LayoutConstraint::activate(
+            {place->heightAnchor().equalToConstant(DocumentPeek::miniatureHeight)});
+    }
+
+    /// Lets the screen go, so that it can be shown elsewhere.
+    void release()
+    {
+        if (_screen->isViewLoaded())
+            _screen->view()->removeFromSuperview();
+        _screen->removeFromParentViewController();
+    }
+
+private:
+    std::shared_ptr<ui::ViewController> _screen;
+};
+
+std::shared_ptr<ui::AlertAction> asAlertAction(const ui::MenuAction& action)
+{
+    const bool isDestructive = action.style == ui::MenuActionStyle::Destructive;
+    auto made = std::make_shared<ui::AlertAction>(action.title,
+        isDestructive ? ui::AlertActionStyle::Destructive : ui::AlertActionStyle::Default,
+        [handler = action.handler](const auto&) { handler(); });
+    made->setEnabled(action.enabled);
+    return made;
+}
+
+} // namespace
+
+std::shared_ptr<ui::AlertController> DocumentPeek::make(const std::string& title,
+    const std::shared_ptr<ui::ViewController>& screen, const ui::Menu& actions, std::function<void()> open)
+{
+    const auto peek =
+        std::make_shared<ui::AlertController>(title, std::string(), ui::AlertStyle::ActionSheet);
+    const auto miniature = std::make_shared<Miniature>(screen);
+    const auto opening = std::make_shared<ui::AlertAction>(localized("Open"), ui::AlertActionStyle::Default,
+        [weak = std::weak_ptr(miniature), open = std::move(open)](const auto&) {
+            if (const auto held = weak.lock())
+                held->release();
+            open();
+        });
+    peek->addAction(opening);
+    peek->setPreferredAction(opening);
+    for (const auto& action : actions)
+        peek->addAction(asAlertAction(action));
+    peek->addAction(std::make_shared<ui::AlertAction>(localized("Cancel"), ui::AlertActionStyle::Cancel));
+    peek->setContentViewController(miniature);
+    return peek;
+}
+
+} // namespace platform::components
