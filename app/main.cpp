@@ -9,6 +9,7 @@
 #include "host/system/GioAppRegistry.h"
 #include "host/system/GioLinkOpener.h"
 #include "host/system/IcuFormatters.h"
+#include "host/system/IndexedNameSearch.h"
 #include "host/system/JournalLogSink.h"
 #include "host/system/JsonKeyedArchiver.h"
 #include "host/system/JsonUserDefaults.h"
@@ -69,6 +70,7 @@ ServiceSet systemServices(const std::string& executable, const UserLocale& local
     set.documentSharing = std::make_shared<host::gtk::DesktopSharing>(types);
     set.folderLister =
         std::make_shared<host::system::ThreadedFolderLister>(set.dispatch, types, locale.formats);
+    set.nameSearch = std::make_shared<host::system::IndexedNameSearch>(set.dispatch, types);
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(types);
     set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
     set.linkOpener = std::make_shared<host::system::GioLinkOpener>();

@@ -14,6 +14,7 @@
 #include "platform/KeyValueStore.h"
 #include "platform/LinkOpener.h"
 #include "platform/Localization.h"
+#include "platform/NameSearch.h"
 #include "platform/NotificationCenter.h"
 #include "platform/PreviewSupport.h"
 #include "platform/StorageOffers.h"

@@ -19,6 +19,7 @@ class KeyValueStore;
 class KeyedArchiver;
 class LinkOpener;
 class Localization;
+class NameSearch;
 class NotificationCenter;
 class PreviewSupport;
 class StorageOfferManager;
@@ -42,6 +43,7 @@ struct ServiceSet {
     std::shared_ptr<KeyedArchiver> keyedArchiver;
     std::shared_ptr<LinkOpener> linkOpener;
     std::shared_ptr<Localization> localization;
+    std::shared_ptr<NameSearch> nameSearch;
     std::shared_ptr<NotificationCenter> notificationCenter;
     std::shared_ptr<PreviewSupport> previewSupport;
     std::shared_ptr<StorageOfferManager> storageOfferManager;
@@ -72,6 +74,7 @@ public:
     KeyedArchiver& keyedArchiver() const { return *_set.keyedArchiver; }
     LinkOpener& linkOpener() const { return *_set.linkOpener; }
     Localization& localization() const { return *_set.localization; }
+    NameSearch& nameSearch() const { return *_set.nameSearch; }
     NotificationCenter& notificationCenter() const { return *_set.notificationCenter; }
     PreviewSupport& previewSupport() const { return *_set.previewSupport; }
     StorageOfferManager& storageOfferManager() const { return *_set.storageOfferManager; }

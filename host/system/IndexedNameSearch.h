@@ -1,0 +1,31 @@
+#pragma once
+
+#include "platform/Dispatch.h"
+#include "platform/NameSearch.h"
+
+#include <memory>
+
+namespace host::system {
+
+class MimeTypeRegistry;
+
+/// Searches a packed index of names (see NameIndex), which is read when the first search begins, brought up
+/// to date every two seconds while one goes on, and dropped a minute after the last one. To bring it up to
+/// date takes a look at each folder, and a reading of those that were modified.
+class IndexedNameSearch : public platform::NameSearch {
+public:
+    IndexedNameSearch(
+        std::shared_ptr<platform::Dispatch> dispatch, std::shared_ptr<const MimeTypeRegistry> types);
+    ~IndexedNameSearch() override;
+
+    std::shared_ptr<platform::NameSearchSession> begin(
+        std::vector<platform::Url> folders, Update update) override;
+
+private:
+    class Store;
+    class Session;
+
+    std::shared_ptr<Store> _store;
+};
+
+} // namespace host::system

@@ -1,0 +1,25 @@
+#pragma once
+
+#include <memory>
+#include <string>
+#include <string_view>
+
+namespace host::system {
+
+/// Makes names comparable for a search: without case, accents and compatibility forms ("Café" as "cafe", "ﬁ"
+/// as "fi"). Any thread.
+class NameFolding {
+public:
+    NameFolding();
+    NameFolding(NameFolding&&) noexcept;
+    ~NameFolding();
+
+    /// Appends the folded form of a name. Bytes that are no UTF-8 become the replacement character.
+    void append(std::string_view name, std::string& folded) const;
+
+private:
+    struct Data;
+    std::unique_ptr<Data> _data;
+};
+
+} // namespace host::system
