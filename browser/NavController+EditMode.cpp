@@ -3,11 +3,13 @@
 #include "browser/ListLogging.h"
 #include "browser/NavController.h"
 #include "drawing/FileTags.h"
+#include "items/MenuEnableChecks.h"
 #include "platform/Formatters.h"
 #include "platform/Localization.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/components/DocumentListController.h"
+#include "platform/ui/Button.h"
 #include "platform/ui/NavigationItem.h"
 #include "platform/ui/View.h"
 
@@ -33,7 +35,8 @@ std::string selectionTitle(std::size_t selected)
 }
 
 constexpr auto offeredActions = actionBit(DocumentListAction::Delete) | actionBit(DocumentListAction::Info)
-    | actionBit(DocumentListAction::Rename) | actionBit(DocumentListAction::PressurePop);
+    | actionBit(DocumentListAction::Rename) | actionBit(DocumentListAction::Share)
+    | actionBit(DocumentListAction::Move) | actionBit(DocumentListAction::PressurePop);
 
 } // namespace
 
@@ -68,8 +71,38 @@ void NavController::configureNavBar(const List& list)
     list->setTitle(_editMode ? platform::localized("Select Items") : _viewTitle);
 }
 
+NavController::Sender NavController::makeToolbarButton(
+    const std::string& title, void (NavController::*operation)(const Sender&))
+{
+    const auto button = std::make_shared<platform::ui::Button>(title);
+    button->sizeToFit();
+    auto item = std::make_shared<BarButtonItem>(button);
+    button->setAction([weak = std::weak_ptr(self()), sender = std::weak_ptr(item), operation] {
+        if (const auto browser = weak.lock())
+            (*browser.*operation)(sender.lock());
+    });
+    return item;
+}
+
+void NavController::configureEditToolbar(const List& list)
+{
+    const auto space = [] { return std::make_shared<BarButtonItem>(SystemItem::FlexibleSpace); };
+    _barButtonNewFolder =
+        makeToolbarButton(platform::localized("New Folder"), &NavController::promtForNewFolderAndCreate);
+    _barButtonMoveItem =
+        makeToolbarButton(platform::localized("Move"), &NavController::showMoveTargetForSelectedItems);
+    _barButtonDeleteItem =
+        makeToolbarButton(platform::localized("Delete"), &NavController::showWarningAndDeleteDocument);
+    list->setToolbarItems({_barButtonNewFolder, space(), _barButtonMoveItem, space(), _barButtonDeleteItem});
+}
+
 void NavController::configureToolbar(const List& list)
 {
+    _barButtonNewFolder = _barButtonMoveItem = _barButtonDeleteItem = nullptr;
+    if (_editMode) {
+        configureEditToolbar(list);
+        return;
+    }
     if (!statusBar(*list))
         createStatusBarButtonPressDelegate(*list, _upgradeOffer, self());
     displayStatusBar(*list);
@@ -86,8 +119,13 @@ void NavController::updateStatusUI(const List& list)
         return;
     bar->setStatusText(toolbarStatusText(shown->containedItemCount()));
     bar->showUpgradeOffer(_upgradeOffer);
-    if (_editMode)
-        shown->setTitle(selectionTitle(shown->selectedItemCount()));
+    if (!_editMode)
+        return;
+    shown->setTitle(selectionTitle(shown->selectedItemCount()));
+    if (_barButtonMoveItem)
+        _barButtonMoveItem->setEnabled(MenuEnableChecks::canShowMoveForSelectedItems(*shown));
+    if (_barButtonDeleteItem)
+        _barButtonDeleteItem->setEnabled(MenuEnableChecks::canShowDeleteForSelectedItems(*shown));
 }
 
 void NavController::beginEditMode(const Sender&)
@@ -127,6 +165,8 @@ void NavController::setEditModeAndUpdateUIForViewController(bool editMode, const
     if (list)
         list->setEditingAnimated(editMode, true);
     configureVisibleControllerForMode();
+    if (_editMode && list && _barButtonNewFolder)
+        _barButtonNewFolder->setEnabled(MenuEnableChecks::canEnableNewFolderForSelectedItems(*list));
 }
 
 void NavController::configureVisibleControllerForMode()

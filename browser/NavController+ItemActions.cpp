@@ -21,6 +21,8 @@ namespace tarrow {
 using platform::localized;
 using platform::localizedPlural;
 using platform::components::DocumentListAction;
+using platform::components::MoveTargetPicker;
+using platform::components::MoveTargetScope;
 
 namespace {
 
@@ -59,8 +61,9 @@ void NavController::documentListControllerPerformActionURL(const List& list, int
     documentListControllerPerformActionURLOriginatingViewCompletion(list, action, url, view(), [] {});
 }
 
-void NavController::documentListControllerPerformActionURLOriginatingViewCompletion(const List&, int action,
-    const Url& url, const std::shared_ptr<platform::ui::View>& originatingView, const Completion& completion)
+void NavController::documentListControllerPerformActionURLOriginatingViewCompletion(const List& list,
+    int action, const Url& url, const std::shared_ptr<platform::ui::View>& originatingView,
+    const Completion& completion)
 {
     static constexpr Operation op{
         "-[NavController documentListController:performAction:URL:originatingView:completion:]"};
@@ -80,6 +83,17 @@ void NavController::documentListControllerPerformActionURLOriginatingViewComplet
         op.userAction("DLC Action Rename");
         op.info("Rename action: %@", url);
         showRenamePrompt(url);
+        break;
+    case DocumentListAction::Share:
+        op.userAction("DLC Action Share (share sheet)");
+        op.info("Activity (share) action: %@", url);
+        call(completion);
+        showDICUrlCompletion(originatingView, url, completion);
+        return;
+    case DocumentListAction::Move:
+        op.userAction("DLC Action Move");
+        op.info("Move action: %@", url);
+        showMoveTargetForItemsInFolder({url}, list ? list->presentedURL() : std::nullopt);
         break;
     case DocumentListAction::PressurePop:
         op.userAction("DLC Action Firmtap Pop");
@@ -111,7 +125,7 @@ void NavController::performInfo(const Url& url)
     showPreviewPreviewMode(item, PreviewModeDetails);
 }
 
-void NavController::promtForNewFolderAndCreate(const std::shared_ptr<platform::ui::BarButtonItem>&)
+void NavController::promtForNewFolderAndCreate(const Sender&)
 {
     static constexpr Operation op{"-[NavController promtForNewFolderAndCreate:]"};
     op.userAction("Pressed NewFolder");
@@ -149,6 +163,51 @@ void NavController::showNewFolderPromptDuringMoveItemsToMove(
     _folderPromptAlert = NewFolderPrompt::newWithTitleDoneButtonTextCompletion(
         title, items.empty() ? localized("Create") : localized("Move"), confirmed);
     presentViewController(_folderPromptAlert->alert(), true);
+}
+
+void NavController::showMoveTargetForSelectedItems(const Sender&)
+{
+    static constexpr Operation op{"-[NavController showMoveTargetForSelectedItems:]"};
+    op.userAction("Pressed Move");
+    op.info("Pressed Move");
+    const auto list = getTopDocumentListController();
+    if (!list)
+        return;
+    const auto items = list->selectedItems();
+    setEditModeAndUpdateUIForViewController(false, list);
+    showMoveTargetForItemsInFolder(items, list->presentedURL());
+}
+
+void NavController::showMoveTargetForItemsInFolder(
+    const std::vector<Url>& items, const std::optional<Url>& folder)
+{
+    static constexpr Operation op{"-[NavController showMoveTargetForItems:inFolder:]"};
+    if (MenuEnableChecks::isDesktopOrDocumentsInURLArray(items)) {
+        op.warning("Not moving items with special folder: %@", items);
+        UIUtils::showUnsupportedError(visibleViewController());
+        return;
+    }
+    op.info("Prompting for Move Target, %d items", items.size());
+    const bool mayLeave = trw_canCrossZoneMoveURLs(items);
+    if (!mayLeave && folder && !MenuEnableChecks::containerHasSubfolders(*folder)) {
+        showNewFolderPromptDuringMoveItemsToMove(folder, items);
+        return;
+    }
+    const auto picker = MoveTargetPicker::initWithItemsScope(
+        items, mayLeave ? MoveTargetScope::AllContainers : MoveTargetScope::Container);
+    picker->setDelegate(self());
+    picker->setPresentationStyle(platform::ui::PresentationStyle::OverCurrentContext);
+    visibleViewController()->presentViewController(picker, true, [] { op.debug("Presented moveTarget"); });
+}
+
+void NavController::documentTargetSelectionControllerDidSelectItemAtURL(
+    const std::shared_ptr<MoveTargetPicker>& picker, const Url& folder)
+{
+    static constexpr Operation op{"-[NavController documentTargetSelectionController:didSelectItemAtURL:]"};
+    op.userAction("Move Target Selected (nav)");
+    op.info("Move Target Selected: %@", folder);
+    picker->dismissViewController(true);
+    moveItemsToDirectoryAndShowErrorsToDirectory(picker->itemsToMove(), folder);
 }
 
 std::vector<Error> NavController::moveItemsToDirectoryToDirectory(
@@ -199,7 +258,7 @@ void NavController::showRenamePrompt(const Url& url)
     visibleViewController()->presentViewController(_folderPromptAlert->alert(), true);
 }
 
-void NavController::showWarningAndDeleteDocument(const std::shared_ptr<platform::ui::BarButtonItem>&)
+void NavController::showWarningAndDeleteDocument(const Sender&)
 {
     static constexpr Operation op{"-[NavController showWarningAndDeleteDocument:]"};
     const auto list = getTopDocumentListController();
@@ -212,7 +271,7 @@ void NavController::showWarningAndDeleteDocument(const std::shared_ptr<platform:
 }
 
 void NavController::showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(
-    const std::vector<Url>& urls, const std::shared_ptr<platform::ui::View>& view, const List&,
+    const std::vector<Url>& urls, const std::shared_ptr<platform::ui::View>& view, const List& list,
     const Completion& finished)
 {
     static constexpr Operation op{
@@ -230,9 +289,11 @@ void NavController::showWarningAndDeleteURLsUsingViewWithDocumentListControllerF
         return;
     }
     UIUtils::showDeleteWarningAlertHasContainerViewControllerUsingViewUsingButtonCompletion(urls,
-        libraries != 0, visibleViewController(), view, nullptr,
-        [browser = self(), urls, finished](const auto&, bool cancelled) {
+        libraries != 0, visibleViewController(), view, _barButtonDeleteItem,
+        [browser = self(), urls, list, finished](const auto&, bool cancelled) {
             op.userAction(cancelled ? "Delete was Cancelled (nav)" : "Delete was Confirmed (nav)");
+            if (!cancelled && list)
+                browser->setEditModeAndUpdateUIForViewController(false, list);
             browser->deleteConfirmed(cancelled ? std::vector<Url>() : urls, finished);
         });
 }
@@ -247,6 +308,30 @@ void NavController::deleteConfirmed(const std::vector<Url>& urls, const Completi
         UIUtils::showAlertMessageParentViewController(
             localizedPlural(".DICT.CANNOT_DELETE_ITEMS.%d", {static_cast<std::int64_t>(outcome.failures)}),
             {}, topViewController());
+}
+
+void NavController::showDICUrlCompletion(
+    const std::shared_ptr<platform::ui::View>& originatingView, const Url& url, const Completion& completion)
+{
+    static constexpr Operation op{"-[NavController showDIC:url:completion:]"};
+    op.userAction("Show Share Sheet (nav)");
+    op.info("showDIC: %@", url);
+    const auto resolved = trw_URLByResolvingBookmark(url).value_or(url);
+    if (resolved != url)
+        op.info("URL resolved to %@", resolved);
+    _performActionCompletionBlock = completion;
+    const auto anchor = originatingView ? originatingView : view();
+    const auto bounds = anchor->bounds();
+    const auto rect =
+        originatingView ? platform::Rect{bounds.x, bounds.midY(), bounds.width, 0} : platform::Rect{};
+    const auto sheet = platform::components::DocumentInteractionSheet::interactionControllerWithURL(resolved);
+    const auto& containers = services().cloudDocumentService().containers();
+    const auto container = containers.containerForItem(resolved);
+    if (containers.isContainerTopFolder(resolved) && container && *container)
+        sheet->setName((*container)->localizedName);
+    sheet->setDelegate(self());
+    _documentInteractionController = sheet;
+    sheet->presentOptionsMenuFromRectInView(visibleViewController(), rect, anchor, true);
 }
 
 } // namespace tarrow

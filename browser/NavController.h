@@ -2,7 +2,9 @@
 
 #include "platform/Date.h"
 #include "platform/NotificationCenter.h"
+#include "platform/components/DocumentInteractionSheet.h"
 #include "platform/components/DocumentListControllerDelegate.h"
+#include "platform/components/MoveTargetPicker.h"
 #include "platform/ui/NavigationController.h"
 #include "prompts/DocumentListControllerStatusBar.h"
 #include "prompts/QuotaFetcher.h"
@@ -36,6 +38,8 @@ class PreviewItemManager;
 class NavController : public platform::ui::NavigationController,
                       public platform::ui::NavigationControllerDelegate,
                       public platform::components::DocumentListControllerDelegate,
+                      public platform::components::MoveTargetPickerDelegate,
+                      public platform::components::DocumentInteractionSheetDelegate,
                       public QuotaFetcherDelegate,
                       public DocumentListControllerStatusBarDelegate {
 public:
@@ -43,6 +47,19 @@ public:
 
     ~NavController() override;
 
+    // The edit mode's toolbar; null outside it.
+    const std::shared_ptr<platform::ui::BarButtonItem>& barButtonNewFolder() const
+    {
+        return _barButtonNewFolder;
+    }
+    const std::shared_ptr<platform::ui::BarButtonItem>& barButtonMoveItem() const
+    {
+        return _barButtonMoveItem;
+    }
+    const std::shared_ptr<platform::ui::BarButtonItem>& barButtonDeleteItem() const
+    {
+        return _barButtonDeleteItem;
+    }
     /// Whether several items are being chosen; lists then neither open nor navigate.
     bool editMode() const { return _editMode; }
     /// Whether a list has reported its contents since the last set-up; the status line waits for that.
@@ -60,7 +77,13 @@ public:
     const std::shared_ptr<PreviewItemManager>& itemManager() const { return _itemManager; }
     /// The name prompt that was shown last.
     const std::shared_ptr<FilenamePrompt>& folderPromptAlert() const { return _folderPromptAlert; }
-    /// What is called when the last list action that asks before a deletion has ended.
+    /// The share sheet that was shown last.
+    const std::shared_ptr<platform::components::DocumentInteractionSheet>&
+    documentInteractionController() const
+    {
+        return _documentInteractionController;
+    }
+    /// The completion of the last list action that deletes or shares.
     const Completion& performActionCompletionBlock() const { return _performActionCompletionBlock; }
     /// The storage upgrade that was started last.
     const std::shared_ptr<platform::components::UpgradeFlow>& upgradeFlowMgr() const
@@ -154,10 +177,21 @@ public:
 
     // Item actions. The file operations block until they are done.
     /// Asks for the name of a new folder in the folder of the list on top.
-    void promtForNewFolderAndCreate(const std::shared_ptr<platform::ui::BarButtonItem>& sender);
+    void promtForNewFolderAndCreate(const Sender& sender);
     /// Asks for the name of a new folder, and moves items into it once it is made.
     void showNewFolderPromptDuringMoveItemsToMove(
         const std::optional<platform::Url>& folder, const std::vector<platform::Url>& items);
+    /// Asks where the selected items of the list on top shall go.
+    void showMoveTargetForSelectedItems(const Sender& sender);
+    /// Asks where items of a folder shall go, or, when there is no other folder, for the name of a new one.
+    void showMoveTargetForItemsInFolder(
+        const std::vector<platform::Url>& items, const std::optional<platform::Url>& folder);
+    void documentTargetSelectionControllerDidSelectItemAtURL(
+        const std::shared_ptr<platform::components::MoveTargetPicker>& picker,
+        const platform::Url& folder) override;
+    /// Shows what can be done with an item outside the drive, at a view or, without one, at the browser's.
+    void showDICUrlCompletion(const std::shared_ptr<platform::ui::View>& view, const platform::Url& url,
+        const Completion& completion);
     /// Asks for an item's new name.
     void showRenamePrompt(const platform::Url& url);
     /// Moves items into a folder, one after the other; answers the errors of those that stayed.
@@ -167,7 +201,7 @@ public:
     void moveItemsToDirectoryAndShowErrorsToDirectory(
         const std::vector<platform::Url>& items, const platform::Url& directory);
     /// Asks before the selected items of the list on top are deleted.
-    void showWarningAndDeleteDocument(const std::shared_ptr<platform::ui::BarButtonItem>& sender);
+    void showWarningAndDeleteDocument(const Sender& sender);
     /// Asks before items (documents and folders, or app libraries) are deleted, at a view or at the toolbar's
     /// button. The finisher (may be empty) is called once, after the answer or a refusal.
     void showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(
@@ -193,6 +227,12 @@ private:
     void performInfo(const platform::Url& url);
     void deleteConfirmed(const std::vector<platform::Url>& urls, const Completion& finished);
 
+    Sender makeToolbarButton(const std::string& title, void (NavController::*operation)(const Sender&));
+    void configureEditToolbar(const List& list);
+
+    std::shared_ptr<platform::ui::BarButtonItem> _barButtonNewFolder, _barButtonMoveItem,
+        _barButtonDeleteItem;
+    std::shared_ptr<platform::components::DocumentInteractionSheet> _documentInteractionController;
     bool _editMode = false;
     bool _pickerIsAlive = false;
     std::weak_ptr<platform::ui::ViewController> _splitViewController;

@@ -1,6 +1,9 @@
 #include "platform/components/DocumentListAction.h"
 #include "platform/components/DocumentListController.h"
+#include "platform/components/MoveTargetPicker.h"
 #include "platform/ui/AlertController.h"
+#include "platform/ui/BarButtonItem.h"
+#include "platform/ui/Button.h"
 #include "platform/ui/Label.h"
 #include "platform/ui/TextField.h"
 #include "platform/ui/View.h"
@@ -220,6 +223,116 @@ TEST_F(ItemActionsTest, AppLibrariesAreDeletedWholeButNeverTheDrive)
     EXPECT_EQ(log->count("INFO Deleting container app.recipes"), 1);
     EXPECT_EQ(log->count("ERROR NOT Deleting root container BrindleDefault"), 1);
     EXPECT_EQ(completions, 2);
+}
+
+TEST_F(ItemActionsTest, EditModeOffersItsButtonsByTheSelection)
+{
+    const auto a = write("a.txt"), b = write("Folder/b.txt");
+    launch();
+    const auto titles = [this] {
+        std::vector<std::string> found;
+        for (const auto& item : topList()->toolbarItems()) {
+            const auto button = std::dynamic_pointer_cast<platform::ui::Button>(item->customView());
+            found.push_back(button ? button->title() : item->isSpace() ? "-" : "status");
+        }
+        return found;
+    };
+    browser->beginEditMode(nullptr);
+    EXPECT_THAT(titles(), ElementsAre("New Folder", "-", "Move", "-", "Delete"));
+    EXPECT_TRUE(browser->barButtonNewFolder()->isEnabled());
+    struct Row {
+        std::vector<Url> selected;
+        bool isOffered;
+    };
+    for (const auto& row :
+        {Row{{}, false}, {{a}, true}, {{a, url("Folder")}, true}, {{a, url("Desktop")}, false}}) {
+        topList()->setSelectedItems(row.selected);
+        EXPECT_EQ(browser->barButtonMoveItem()->isEnabled(), row.isOffered) << row.selected.size();
+        EXPECT_EQ(browser->barButtonDeleteItem()->isEnabled(), row.isOffered) << row.selected.size();
+    }
+    topList()->setSelectedItems({a});
+    const auto press = [](const std::shared_ptr<platform::ui::BarButtonItem>& item) {
+        std::dynamic_pointer_cast<platform::ui::Button>(item->customView())->press();
+    };
+    press(browser->barButtonNewFolder());
+    EXPECT_EQ(takeAlert(), "New Folder");
+    press(browser->barButtonDeleteItem());
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_EQ(std::get<std::weak_ptr<platform::ui::BarButtonItem>>(alert()->popoverAnchor()).lock(),
+        browser->barButtonDeleteItem());
+    alert()->userCancelled();
+    EXPECT_TRUE(browser->editMode()) << "nothing happened";
+    press(browser->barButtonDeleteItem());
+    alert()->press(0);
+    settle();
+    EXPECT_FALSE(isThere("a.txt"));
+    EXPECT_FALSE(browser->editMode());
+    EXPECT_THAT(titles(), ElementsAre("-", "status", "-"));
+    EXPECT_EQ(browser->barButtonDeleteItem(), nullptr);
+    EXPECT_EQ(log->count("INFO Pressed Delete after selecting 1 items: " + logText(std::vector<Url>{a})), 2);
+}
+
+TEST_F(ItemActionsTest, ItemsMoveToTheFolderThatIsChosen)
+{
+    const auto a = write("a.txt"), b = write("b.txt");
+    write("Folder/b.txt");
+    launch();
+    browser->beginEditMode(nullptr);
+    topList()->setSelectedItems({a, b});
+    browser->showMoveTargetForSelectedItems(nullptr);
+    EXPECT_FALSE(browser->editMode());
+    const auto picker =
+        std::dynamic_pointer_cast<platform::components::MoveTargetPicker>(browser->presentedViewController());
+    ASSERT_NE(picker, nullptr);
+    EXPECT_THAT(picker->itemsToMove(), ElementsAre(a, b));
+    EXPECT_EQ(picker->presentationStyle(), platform::ui::PresentationStyle::OverCurrentContext);
+    EXPECT_EQ(log->count("INFO Prompting for Move Target, 2 items"), 1);
+    browser->documentTargetSelectionControllerDidSelectItemAtURL(picker, url("Folder"));
+    EXPECT_TRUE(isThere("Folder/a.txt"));
+    EXPECT_TRUE(isThere("b.txt")) << "nothing is replaced";
+    EXPECT_EQ(takeAlert(), "An item named “b.txt” already exists in the new location.");
+    EXPECT_EQ(browser->presentedViewController(), nullptr);
+
+    perform(DocumentListAction::Move, url("Desktop"));
+    EXPECT_EQ(takeAlert(), "This operation is not supported.");
+}
+
+TEST_F(ItemActionsTest, WithoutAnyFolderAMoveMakesOne)
+{
+    const auto documents = drive.makeContainer("app.notes");
+    const auto note = documents.appendingPathComponent("note.txt");
+    std::filesystem::copy_file(write("note.txt").path(), note.path());
+    launch();
+    // With only one container there is nowhere else to go.
+    std::filesystem::remove_all(drive.layout().defaultContainer());
+    browser->showMoveTargetForItemsInFolder({note}, documents);
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_EQ(alert()->title(), "Move 1 Item");
+    EXPECT_EQ(enter("Notes"), "");
+    EXPECT_TRUE(std::filesystem::exists(documents.path() + "/Notes/note.txt"));
+}
+
+TEST_F(ItemActionsTest, TheShareSheetPointsAtTheMiddleOfItsView)
+{
+    const auto target = write("Folder/a.txt");
+    drive.writeReference("a.txt.trwref", "BrindleDefault", "Folder/a.txt");
+    const auto recipes = drive.makeContainer("app.recipes");
+    launch();
+    const auto view = std::make_shared<platform::ui::View>(platform::Rect{0, 0, 300, 60});
+    browser->showDICUrlCompletion(view, url("a.txt.trwref"), {});
+    EXPECT_EQ(browser->documentInteractionController()->url(), target);
+    EXPECT_EQ(log->count("INFO URL resolved to " + logText(target)), 1);
+    ASSERT_NE(alert(), nullptr);
+    const auto* place = std::get_if<platform::ui::ViewAnchor>(&alert()->popoverAnchor());
+    ASSERT_NE(place, nullptr);
+    EXPECT_EQ(place->view.lock(), view);
+    EXPECT_EQ(place->rect, (platform::Rect{0, 30, 300, 0}));
+    alert()->userCancelled();
+    settle();
+
+    perform(DocumentListAction::Share, recipes);
+    EXPECT_EQ(completions, 1) << "the list need not wait for the sheet";
+    EXPECT_EQ(browser->documentInteractionController()->name(), "app.recipes");
 }
 
 TEST_F(ItemActionsTest, CodesThatNobodyOffers)

@@ -11,6 +11,7 @@
 #include "platform/ui/AlertController.h"
 #include "platform/ui/Window.h"
 #include "preview/LookwellItemController.h"
+#include "tests/support/RecordingSharing.h"
 
 namespace testing_support {
 
@@ -43,6 +44,7 @@ BrowserFixture::BrowserFixture()
     set.characterData = borrowed(_driveServices.characterData());
     set.cloudDocumentService = cloud;
     set.dispatch = drive.dispatch;
+    set.documentSharing = std::make_shared<RecordingSharing>();
     set.fileCoordinator = borrowed(_driveServices.fileCoordinator());
     set.fileSystem = borrowed(_driveServices.fileSystem());
     set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(drive.dispatch, types, "en_US");

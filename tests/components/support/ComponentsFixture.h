@@ -6,7 +6,7 @@
 #include "platform/components/DocumentListController.h"
 #include "platform/components/DocumentListControllerDelegate.h"
 #include "tests/components/support/HandLister.h"
-#include "tests/components/support/RecordingSharing.h"
+#include "tests/support/RecordingSharing.h"
 #include "tests/support/DriveFixture.h"
 #include "tests/support/SimulatedApps.h"
 
