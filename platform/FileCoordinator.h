@@ -31,7 +31,8 @@ public:
     virtual ~FileCoordinator() = default;
 
     /// Runs the accessor once with the location to use, which may differ from `url`. Answers an error, and
-    /// does not run the accessor, when the read cannot be coordinated.
+    /// does not run the accessor, when the read cannot be coordinated: EBUSY when another thread or process
+    /// keeps the item too long. One that was killed keeps nothing.
     virtual std::optional<Error> coordinateReading(
         const Url& url, ReadingOptions options, const Accessor& accessor) = 0;
 

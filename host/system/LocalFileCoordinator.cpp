@@ -3,12 +3,14 @@
 #include "host/system/CoordinatedRead.h"
 #include "host/system/DriveNames.h"
 #include "host/system/SystemErrors.h"
+#include "platform/Log.h"
 
 #include <sys/stat.h>
 
 #include <algorithm>
 #include <array>
 #include <cerrno>
+#include <system_error>
 
 namespace host::system {
 
@@ -84,6 +86,7 @@ LocalFileCoordinator::LocalFileCoordinator()
 
 LocalFileCoordinator::LocalFileCoordinator(Settings settings)
     : _locks(std::move(settings.lockFile))
+    , _lockPatience(settings.lockPatience)
     , _notices(settings.patience, std::move(settings.beforeWaiting))
 {
 }
@@ -111,6 +114,7 @@ std::optional<Error> LocalFileCoordinator::coordinateReading(
 
 std::optional<Error> LocalFileCoordinator::runLocked(const Claims& claims, const std::function<void()>& body)
 {
+    static constexpr platform::Operation op{"-[LocalFileCoordinator runLocked:]"};
     Claims missing;
     std::ranges::copy_if(claims, std::back_inserter(missing), [](const auto& c) { return !isCovered(c); });
     for (const auto& claim : missing) {
@@ -118,8 +122,12 @@ std::optional<Error> LocalFileCoordinator::runLocked(const Claims& claims, const
             return systemError(EDEADLK, claim.path);
     }
     FileDescriptor held;
-    if (const int failure = missing.empty() ? 0 : _locks.acquire(missing, held); failure != 0)
+    if (const int failure = missing.empty() ? 0 : _locks.acquire(missing, _lockPatience, held);
+        failure != 0) {
+        op.warning(
+            "Cannot lock %@: %{public}s", missing.front().path, std::generic_category().message(failure));
         return systemError(failure, missing.front().path);
+    }
     const EnteredClaims entered(missing);
     body();
     return std::nullopt;

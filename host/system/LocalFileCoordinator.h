@@ -19,6 +19,9 @@ public:
         std::string lockFile = {};
         /// How long each write waits for presenters.
         platform::Duration patience = std::chrono::seconds(3);
+        /// How long each read and write waits for others that have its item: longer than any save takes, and
+        /// no longer than a person waits for a program that hangs.
+        platform::Duration lockPatience = std::chrono::seconds(10);
         /// Runs on the writer's thread before it waits for presenters.
         std::function<void()> beforeWaiting = nullptr;
     };
@@ -49,6 +52,7 @@ private:
     void tellAfterwards(const Target& target);
 
     LockFile _locks;
+    platform::Duration _lockPatience;
     PresenterNotices _notices;
 };
 

@@ -4,7 +4,10 @@
 #include <sys/mman.h>
 #include <sys/stat.h>
 
+#include <algorithm>
 #include <cerrno>
+#include <thread>
+#include <utility>
 
 namespace host::system {
 
@@ -19,16 +22,48 @@ std::int64_t byteOf(std::string_view path)
     return static_cast<std::int64_t>(hash >> 2);
 }
 
-int lockByte(const FileDescriptor& file, std::int64_t byte, LockMode mode)
+using Clock = std::chrono::steady_clock;
+
+/// The pauses of one wait. The kernel's own wait has no end when the holder hangs, so the lock is asked for
+/// again and again: at once as long as a short holder may be running, then less and less often.
+class Pauses {
+public:
+    explicit Pauses(platform::Duration patience)
+        : _end(Clock::now() + patience)
+    {
+    }
+    /// False when there is no time left.
+    bool next()
+    {
+        if (Clock::now() >= _end)
+            return false;
+        if (_taken++ < yields)
+            std::this_thread::yield();
+        else
+            std::this_thread::sleep_for(std::exchange(_pause, std::min(2 * _pause, longest)));
+        return true;
+    }
+
+private:
+    static constexpr int yields = 32;
+    static constexpr Clock::duration longest = std::chrono::milliseconds(10);
+    Clock::time_point _end;
+    Clock::duration _pause = std::chrono::microseconds(50);
+    int _taken = 0;
+};
+
+int lockByte(const FileDescriptor& file, std::int64_t byte, LockMode mode, Pauses& pauses)
 {
     struct flock lock { };
     lock.l_type = mode == LockMode::Exclusive ? F_WRLCK : F_RDLCK;
     lock.l_whence = SEEK_SET;
     lock.l_start = byte;
     lock.l_len = 1;
-    while (::fcntl(file.get(), F_OFD_SETLKW, &lock) != 0) {
-        if (errno != EINTR)
+    while (::fcntl(file.get(), F_OFD_SETLK, &lock) != 0) {
+        if (errno != EINTR && errno != EAGAIN && errno != EACCES)
             return errno;
+        if (!pauses.next())
+            return EBUSY;
     }
     return 0;
 }
@@ -56,7 +91,8 @@ void LockFile::addPath(Bytes& bytes, const Claim& claim)
         own = LockMode::Exclusive;
 }
 
-int LockFile::acquire(const std::vector<Claim>& claims, FileDescriptor& held) const
+int LockFile::acquire(
+    const std::vector<Claim>& claims, platform::Duration patience, FileDescriptor& held) const
 {
     Bytes bytes;
     for (const auto& claim : claims)
@@ -65,8 +101,9 @@ int LockFile::acquire(const std::vector<Claim>& claims, FileDescriptor& held) co
     FileDescriptor file(::open(_path.c_str(), flags, S_IRUSR | S_IWUSR));
     if (!file)
         return errno;
+    Pauses pauses(patience);
     for (const auto& [byte, mode] : bytes) {
-        if (const int failure = lockByte(file, byte, mode); failure != 0)
+        if (const int failure = lockByte(file, byte, mode, pauses); failure != 0)
             return failure;
     }
     held = std::move(file);

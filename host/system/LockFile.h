@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/system/FileDescriptor.h"
+#include "platform/Dispatch.h"
 
 #include <cstdint>
 #include <map>
@@ -29,9 +30,10 @@ public:
     /// they are missing.
     explicit LockFile(std::string path);
 
-    /// Waits until all claims can be had. Answers 0, and the open file that holds the locks until it is
-    /// closed, else the errno of what failed (EROFS or EACCES when the file cannot be written).
-    int acquire(const std::vector<Claim>& claims, FileDescriptor& held) const;
+    /// Waits until all claims can be had, but no longer than `patience` in all. Answers 0, and the open file
+    /// that holds the locks until it is closed, else the errno of what failed: EBUSY when someone else kept
+    /// them all that time, EROFS or EACCES when the file cannot be written.
+    int acquire(const std::vector<Claim>& claims, platform::Duration patience, FileDescriptor& held) const;
 
 private:
     using Bytes = std::map<std::int64_t, LockMode>;

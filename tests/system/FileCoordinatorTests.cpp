@@ -71,7 +71,10 @@ class FileCoordinatorTest : public testing::Test {
 protected:
     LocalFileCoordinator::Settings settings(platform::Duration patience = std::chrono::seconds(60)) const
     {
-        return {_folder.at("locks/all"), patience, [this] { _dispatch->runUntilIdle(); }};
+        return {.lockFile = _folder.at("locks/all"),
+            .patience = patience,
+            .lockPatience = std::chrono::minutes(1),
+            .beforeWaiting = [this] { _dispatch->runUntilIdle(); }};
     }
     std::shared_ptr<RecordingPresenter> present(LocalFileCoordinator& coordinator, const std::string& path)
     {
