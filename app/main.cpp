@@ -87,7 +87,9 @@ DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale)
     set.cloudDocumentService = cloud;
     set.fileSystem = std::make_shared<host::system::PosixFileSystem>(cloud->itemChanges());
     set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>(
-        host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination()});
+        host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination(),
+            .root = cloud->layout().documents(),
+            .dispatch = set.dispatch});
     set.storageOfferManager = cloud->storageOffers();
     set.keyValueStore = cloud->keyValueStore();
     set.userDefaults =

@@ -50,7 +50,8 @@ public:
     virtual void itemWillMove(const Url& from, const Url& to) = 0;
     virtual void itemDidMove(const Url& from, const Url& to) = 0;
 
-    /// From now on the presenter is called; it is not kept alive. Adding one twice adds nothing.
+    /// From now on the presenter is called, a moment later also for what other processes do; it is not kept
+    /// alive. Adding one twice adds nothing.
     virtual void addFilePresenter(const std::shared_ptr<FilePresenter>& presenter) = 0;
     /// After this no call to the presenter begins, but for those that already wait in its queue.
     virtual void removeFilePresenter(const FilePresenter& presenter) = 0;

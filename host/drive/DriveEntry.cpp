@@ -17,12 +17,6 @@ using host::system::FileDescriptor;
 using platform::ItemVersion;
 using platform::Result;
 
-namespace {
-
-constexpr std::int64_t nanosecondsPerSecond = 1'000'000'000;
-
-} // namespace
-
 Result<DriveEntry> DriveEntry::open(const DriveLayout& layout, const std::string& path)
 {
     const auto& root = layout.documents();
@@ -70,13 +64,6 @@ Result<LocatedItem> LocatedItem::locate(const DriveLayout& layout, const std::st
     if (const int failure = item.entry.find(item.name, item.found); failure != 0)
         return itemError(failure, path);
     return item;
-}
-
-ItemVersion versionOf(const struct stat& status)
-{
-    return {status.st_dev, status.st_ino, static_cast<std::uint64_t>(status.st_size),
-        status.st_mtim.tv_sec * nanosecondsPerSecond + status.st_mtim.tv_nsec,
-        status.st_ctim.tv_sec * nanosecondsPerSecond + status.st_ctim.tv_nsec};
 }
 
 bool isSameContent(const ItemVersion& a, const ItemVersion& b)

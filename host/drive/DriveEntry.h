@@ -2,6 +2,7 @@
 
 #include "host/drive/DriveLayout.h"
 #include "host/system/FileDescriptor.h"
+#include "host/system/FileVersion.h"
 #include "platform/FileSystem.h"
 
 #include <sys/stat.h>
@@ -41,7 +42,7 @@ struct LocatedItem {
     bool isPromise() const { return name != entry.name; }
 };
 
-platform::ItemVersion versionOf(const struct stat& status);
+using host::system::versionOf;
 /// Whether both are one item of one content; a rename in between changes no more than the time of change.
 bool isSameContent(const platform::ItemVersion& a, const platform::ItemVersion& b);
 

@@ -29,13 +29,13 @@ bool Inotify::Event::isLoss() const
 
 struct Inotify::State {
     FileDescriptor descriptor;
-    int initError = 0;
     std::uint32_t events = watchedEvents;
     std::function<void()> arrived;
     guint source = 0;
     std::mutex mutex;
     std::vector<Event> waiting;
 
+    static bool open(const std::shared_ptr<State>& state);
     void read();
     void append(const char* bytes, std::size_t length);
     static gboolean readable(gint, GIOCondition, gpointer data);
@@ -63,7 +63,8 @@ void Inotify::State::append(const char* bytes, std::size_t length)
 void Inotify::State::read()
 {
     alignas(inotify_event) std::array<char, 16 * 1024> buffer;
-    for (;;) {
+    // No more than the kernel ever holds: others may add events as quickly as they are read.
+    for (std::size_t turn = 0; turn < mostEvents; ++turn) {
         const auto length = ::read(descriptor.get(), buffer.data(), buffer.size());
         if (length > 0)
             append(buffer.data(), static_cast<std::size_t>(length));
@@ -94,16 +95,22 @@ Inotify::Inotify(Writing writing, std::function<void()> arrived)
     _state->arrived = std::move(arrived);
     if (writing == Writing::AtOnce)
         _state->events |= IN_MODIFY;
-    _state->descriptor = FileDescriptor(::inotify_init1(IN_NONBLOCK | IN_CLOEXEC));
-    if (!_state->descriptor) {
-        _state->initError = errno;
-        return;
-    }
-    auto data = std::make_unique<std::weak_ptr<State>>(_state);
-    _state->source = g_unix_fd_add_full(G_PRIORITY_DEFAULT, _state->descriptor.get(), G_IO_IN,
-        State::readable, data.release(), [](gpointer held) {
+}
+
+/// Opens the queue unless it is open; the mutex is held.
+bool Inotify::State::open(const std::shared_ptr<State>& state)
+{
+    if (state->descriptor)
+        return true;
+    state->descriptor = FileDescriptor(::inotify_init1(IN_NONBLOCK | IN_CLOEXEC));
+    if (!state->descriptor)
+        return false;
+    auto data = std::make_unique<std::weak_ptr<State>>(state);
+    state->source = g_unix_fd_add_full(G_PRIORITY_DEFAULT, state->descriptor.get(), G_IO_IN, State::readable,
+        data.release(), [](gpointer held) {
             std::unique_ptr<std::weak_ptr<State>>(static_cast<std::weak_ptr<State>*>(held));
         });
+    return true;
 }
 
 Inotify::~Inotify()
@@ -114,10 +121,12 @@ Inotify::~Inotify()
 
 int Inotify::watch(const std::string& folder)
 {
-    if (!_state->descriptor) {
-        errno = _state->initError;
-        return -1;
+    {
+        const std::lock_guard lock(_state->mutex);
+        if (!State::open(_state))
+            return -1;
     }
+    // Looking the folder up may take long on a storage that hangs; events are read meanwhile.
     return ::inotify_add_watch(_state->descriptor.get(), folder.c_str(), _state->events);
 }
 

@@ -8,8 +8,8 @@
 
 namespace host::system {
 
-/// The kernel's notices of what happens in folders: one queue of the kernel's, read in the main loop (GLib's
-/// default main context). Any thread, but for what `arrived` says.
+/// The kernel's notices of what happens in folders: one queue of the kernel's, made for the first watch and
+/// read in the main loop (GLib's default main context). Any thread, but for what `arrived` says.
 class Inotify {
 public:
     /// Whether a file that is being written tells so at once, or when it is closed.

@@ -1,11 +1,9 @@
 #include "host/system/LocalFileCoordinator.h"
 
 #include "host/system/CoordinatedRead.h"
-#include "host/system/DriveNames.h"
+#include "host/system/ItemPaths.h"
 #include "host/system/SystemErrors.h"
 #include "platform/Log.h"
-
-#include <sys/stat.h>
 
 #include <algorithm>
 #include <array>
@@ -42,16 +40,10 @@ private:
     std::size_t _before;
 };
 
-bool isWithin(std::string_view path, std::string_view folder)
-{
-    return path.starts_with(folder)
-        && (path.size() == folder.size() || folder == "/" || path[folder.size()] == '/');
-}
-
 bool isCovered(const LockFile::Claim& claim)
 {
     return std::ranges::any_of(claimsOfThread, [&](const auto& had) {
-        return had.mode == LockMode::Exclusive ? isWithin(claim.path, had.path)
+        return had.mode == LockMode::Exclusive ? isPathWithin(claim.path, had.path)
                                                : claim.mode == LockMode::Shared && claim.path == had.path;
     });
 }
@@ -60,18 +52,8 @@ bool isCovered(const LockFile::Claim& claim)
 bool isBlocked(const LockFile::Claim& claim)
 {
     return claim.mode == LockMode::Exclusive && std::ranges::any_of(claimsOfThread, [&](const auto& had) {
-        return isWithin(had.path, claim.path);
+        return isPathWithin(had.path, claim.path);
     });
-}
-
-bool isThere(const Url& url)
-{
-    struct stat found;
-    if (::lstat(url.path().c_str(), &found) == 0)
-        return true;
-    const auto promise =
-        url.deletingLastPathComponent().path() + "/." + url.lastPathComponent() + std::string(promiseSuffix);
-    return ::lstat(promise.c_str(), &found) == 0;
 }
 
 /// The moves that were announced in the current write of this thread and did not happen yet.
@@ -87,8 +69,16 @@ LocalFileCoordinator::LocalFileCoordinator()
 LocalFileCoordinator::LocalFileCoordinator(Settings settings)
     : _locks(std::move(settings.lockFile))
     , _lockPatience(settings.lockPatience)
-    , _notices(settings.patience, std::move(settings.beforeWaiting))
+    , _notices(std::make_shared<PresenterNotices>(settings.patience, std::move(settings.beforeWaiting)))
 {
+    if (settings.dispatch && !settings.root.empty())
+        _watch = PresenterWatch::create(_notices, std::move(settings.dispatch), std::move(settings.root));
+}
+
+LocalFileCoordinator::~LocalFileCoordinator()
+{
+    if (_watch)
+        _watch->stop();
 }
 
 std::optional<Error> LocalFileCoordinator::coordinateReading(
@@ -141,14 +131,27 @@ std::optional<Error> LocalFileCoordinator::write(
         claims.push_back({target.url.path(), LockMode::Exclusive});
         if (target.options != WritingOptions::ForDeleting)
             continue;
-        if (auto refused = _notices.askForDeletion(target.url)) {
+        if (auto refused = _notices->askForDeletion(target.url)) {
             tellAfterwards(target);
             return refused;
         }
     }
-    auto error = runLocked(claims, body);
+    auto error = runLocked(claims, [&] { runWatched(targets, body); });
     std::ranges::for_each(targets, [this](const auto& target) { tellAfterwards(target); });
     return error;
+}
+
+/// Runs a write that this process's presenters hear of otherwise than by the watch.
+void LocalFileCoordinator::runWatched(std::span<const Target> targets, const std::function<void()>& body)
+{
+    if (!_watch)
+        return body();
+    std::vector<PresenterWatch::OwnWrite> writes;
+    for (const auto& target : targets)
+        writes.push_back({target.url.path(), target.options == WritingOptions::ForDeleting});
+    _watch->beginOwnWrite(writes);
+    body();
+    _watch->endOwnWrite(writes);
 }
 
 void LocalFileCoordinator::tellAfterwards(const Target& target)
@@ -156,12 +159,12 @@ void LocalFileCoordinator::tellAfterwards(const Target& target)
     const auto& url = target.url;
     const bool wasOnlyAnnounced = std::erase(announcedMoves, url.path()) > 0;
     const bool isMoveDone = target.options == WritingOptions::ForMoving && !wasOnlyAnnounced;
-    const bool isGone = target.options == WritingOptions::ForDeleting && !isThere(url);
+    const bool isGone = target.options == WritingOptions::ForDeleting && !isItemThere(url.path());
     // Whoever presents the item itself has heard of the move or of the deletion; its folder changed.
     if (isMoveDone || isGone)
-        _notices.tellOfChange(url.deletingLastPathComponent());
+        _notices->tellOfChange(url.deletingLastPathComponent());
     else
-        _notices.tellOfChange(url);
+        _notices->tellOfChange(url);
 }
 
 std::optional<Error> LocalFileCoordinator::coordinateWriting(
@@ -181,23 +184,29 @@ std::optional<Error> LocalFileCoordinator::coordinateWriting(const Url& first, W
 void LocalFileCoordinator::itemWillMove(const Url& from, const Url& to)
 {
     announcedMoves.push_back(from.path());
-    _notices.announceMove(from, to);
+    _notices->announceMove(from, to);
 }
 
 void LocalFileCoordinator::itemDidMove(const Url& from, const Url& to)
 {
     std::erase(announcedMoves, from.path());
-    _notices.tellOfMove(from, to);
+    _notices->tellOfMove(from, to);
+    if (_watch)
+        _watch->ownMove(from.path(), to.path());
 }
 
 void LocalFileCoordinator::addFilePresenter(const std::shared_ptr<platform::FilePresenter>& presenter)
 {
-    _notices.add(presenter);
+    _notices->add(presenter);
+    if (_watch)
+        _watch->presentersChanged();
 }
 
 void LocalFileCoordinator::removeFilePresenter(const platform::FilePresenter& presenter)
 {
-    _notices.remove(presenter);
+    _notices->remove(presenter);
+    if (_watch)
+        _watch->presentersChanged();
 }
 
 } // namespace host::system

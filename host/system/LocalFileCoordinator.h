@@ -2,6 +2,7 @@
 
 #include "host/system/LockFile.h"
 #include "host/system/PresenterNotices.h"
+#include "host/system/PresenterWatch.h"
 #include "platform/FileCoordinator.h"
 
 #include <span>
@@ -22,12 +23,18 @@ public:
         /// How long each read and write waits for others that have its item: longer than any save takes, and
         /// no longer than a person waits for a program that hangs.
         platform::Duration lockPatience = std::chrono::seconds(10);
+        /// The folder whose items are presented, and the queues on which changes by other processes are
+        /// looked for; a watch in the main loop (GLib's default main context) tells of them. Empty and null:
+        /// presenters hear of this process alone.
+        std::string root = {};
+        std::shared_ptr<platform::Dispatch> dispatch = nullptr;
         /// Runs on the writer's thread before it waits for presenters.
         std::function<void()> beforeWaiting = nullptr;
     };
 
     LocalFileCoordinator();
     explicit LocalFileCoordinator(Settings settings);
+    ~LocalFileCoordinator() override;
 
     std::optional<platform::Error> coordinateReading(
         const platform::Url& url, platform::ReadingOptions options, const Accessor& accessor) override;
@@ -47,13 +54,15 @@ private:
         platform::WritingOptions options;
     };
     std::optional<platform::Error> write(std::span<const Target> targets, const std::function<void()>& body);
+    void runWatched(std::span<const Target> targets, const std::function<void()>& body);
     std::optional<platform::Error> runLocked(
         const std::vector<LockFile::Claim>& claims, const std::function<void()>& body);
     void tellAfterwards(const Target& target);
 
     LockFile _locks;
     platform::Duration _lockPatience;
-    PresenterNotices _notices;
+    std::shared_ptr<PresenterNotices> _notices;
+    std::shared_ptr<PresenterWatch> _watch; ///< null without a root
 };
 
 } // namespace host::system

@@ -94,16 +94,33 @@ void PresenterNotices::remove(const FilePresenter& presenter)
     });
 }
 
+std::vector<std::weak_ptr<FilePresenter>> PresenterNotices::presenters() const
+{
+    const std::lock_guard lock(_mutex);
+    return _presenters;
+}
+
+void PresenterNotices::tell(
+    const std::weak_ptr<FilePresenter>& presenter, std::function<void(FilePresenter&)> call) const
+{
+    const auto told = presenter.lock();
+    const auto isTold = [&](const auto& known) { return known.lock() == told; };
+    if (!told || std::ranges::none_of(presenters(), isTold))
+        return;
+    const auto queue = told->presentedItemOperationQueue();
+    if (!queue)
+        return;
+    queue->addOperation([presenter, call = std::move(call)] {
+        if (const auto strong = presenter.lock())
+            call(*strong);
+    });
+}
+
 std::vector<PresenterNotices::Presented> PresenterNotices::presented() const
 {
-    std::vector<std::weak_ptr<FilePresenter>> known;
-    {
-        const std::lock_guard lock(_mutex);
-        known = _presenters;
-    }
     // Presenters take locks of their own to answer; none of ours may be held meanwhile.
     std::vector<Presented> all;
-    for (const auto& weak : known) {
+    for (const auto& weak : presenters()) {
         const auto presenter = weak.lock();
         const auto url = presenter ? presenter->presentedItemURL() : std::nullopt;
         if (auto queue = url ? presenter->presentedItemOperationQueue() : nullptr)
@@ -176,11 +193,9 @@ void PresenterNotices::tellOfMove(const Url& from, const Url& to)
     for (const auto& each : presented()) {
         if (!each.url.isWithin(from))
             continue;
-        each.queue->addOperation(
-            [weak = std::weak_ptr(each.presenter), destination = moved(each.url, from, to)] {
-                if (const auto presenter = weak.lock())
-                    presenter->presentedItemDidMoveToURL(destination);
-            });
+        tell(each.presenter, [destination = moved(each.url, from, to)](auto& presenter) {
+            presenter.presentedItemDidMoveToURL(destination);
+        });
     }
 }
 
@@ -189,10 +204,7 @@ void PresenterNotices::tellOfChange(const Url& url)
     for (const auto& each : presented()) {
         if (!url.isWithin(each.url))
             continue;
-        each.queue->addOperation([weak = std::weak_ptr(each.presenter)] {
-            if (const auto presenter = weak.lock())
-                presenter->presentedItemDidChange();
-        });
+        tell(each.presenter, [](auto& presenter) { presenter.presentedItemDidChange(); });
     }
 }
 

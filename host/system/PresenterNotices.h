@@ -26,6 +26,11 @@ public:
     void add(const std::shared_ptr<platform::FilePresenter>& presenter);
     void remove(const platform::FilePresenter& presenter);
 
+    std::vector<std::weak_ptr<platform::FilePresenter>> presenters() const;
+    /// Calls a presenter in its queue, unless it was removed.
+    void tell(const std::weak_ptr<platform::FilePresenter>& presenter,
+        std::function<void(platform::FilePresenter&)> call) const;
+
     /// Asks the presenters of an item, of what lies below it and of the folders above it to prepare for its
     /// deletion, and waits for them. Answers the first error that one of them gave.
     std::optional<platform::Error> askForDeletion(const platform::Url& url);

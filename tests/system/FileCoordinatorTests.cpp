@@ -2,6 +2,7 @@
 #include "tests/support/RecordingLog.h"
 #include "tests/support/TemporaryDirectory.h"
 #include "tests/support/VirtualDispatch.h"
+#include "tests/system/support/RecordingPresenter.h"
 
 #include <gmock/gmock.h>
 
@@ -24,48 +25,7 @@ using platform::WritingOptions;
 using testing::ElementsAre;
 using testing::IsEmpty;
 using testing::UnorderedElementsAre;
-
-/// Writes down what it hears, with the name of the item at that time; answers as it is told to.
-class RecordingPresenter : public platform::FilePresenter {
-public:
-    RecordingPresenter(const std::string& path, std::shared_ptr<platform::OperationQueue> queue)
-        : url(Url::fileURL(path))
-        , _queue(std::move(queue))
-    {
-    }
-    Url url;
-    std::optional<Error> answer;
-    bool isSilent = false;
-    std::vector<std::string> heard;
-    std::vector<CompletionHandler> kept;
-
-    std::optional<Url> presentedItemURL() override { return url; }
-    std::shared_ptr<platform::OperationQueue> presentedItemOperationQueue() override { return _queue; }
-    void presentedItemDidChange() override { heard.push_back("changed"); }
-    void presentedItemWillMoveToURL(const Url& to) override { heard.push_back("moves to " + to.path()); }
-    void presentedItemDidMoveToURL(const Url& to) override { heard.push_back("moved to " + to.path()); }
-    void accommodatePresentedItemDeletionWithCompletionHandler(CompletionHandler completion) override
-    {
-        heard.push_back("deletes");
-        reply(std::move(completion));
-    }
-    void accommodatePresentedSubitemDeletionAtURLCompletionHandler(
-        const Url& item, CompletionHandler completion) override
-    {
-        heard.push_back("deletes " + item.lastPathComponent());
-        reply(std::move(completion));
-    }
-
-private:
-    void reply(CompletionHandler completion)
-    {
-        if (isSilent)
-            return kept.push_back(std::move(completion));
-        completion(answer);
-        completion(Error(platform::errorDomain::system, EIO)); // a second answer counts for nothing
-    }
-    std::shared_ptr<platform::OperationQueue> _queue;
-};
+using testing_support::RecordingPresenter;
 
 class FileCoordinatorTest : public testing::Test {
 protected:

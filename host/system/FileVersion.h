@@ -1,0 +1,21 @@
+#pragma once
+
+#include "platform/FileSystem.h"
+
+#include <sys/stat.h>
+
+namespace host::system {
+
+inline std::int64_t nanosecondsOf(const timespec& time)
+{
+    return time.tv_sec * std::int64_t{1'000'000'000} + time.tv_nsec;
+}
+
+/// The state of an item, as the kernel describes it.
+inline platform::ItemVersion versionOf(const struct stat& status)
+{
+    return {status.st_dev, status.st_ino, static_cast<std::uint64_t>(status.st_size),
+        nanosecondsOf(status.st_mtim), nanosecondsOf(status.st_ctim)};
+}
+
+} // namespace host::system

@@ -1,0 +1,45 @@
+#include "host/system/ItemPaths.h"
+
+#include "host/system/DriveNames.h"
+
+#include <sys/stat.h>
+
+namespace host::system {
+
+bool isPathWithin(std::string_view path, std::string_view folder)
+{
+    return path.starts_with(folder)
+        && (path.size() == folder.size() || folder == "/" || path[folder.size()] == '/');
+}
+
+std::string parentPath(const std::string& path)
+{
+    const auto slash = path.rfind('/');
+    return slash == 0 ? "/" : path.substr(0, slash);
+}
+
+std::string promisePath(const std::string& path)
+{
+    const auto nameAt = path.rfind('/') + 1;
+    return path.substr(0, nameAt) + "." + path.substr(nameAt) + std::string(promiseSuffix);
+}
+
+std::string itemName(const std::string& name)
+{
+    const bool isPromise =
+        name.starts_with('.') && name.ends_with(promiseSuffix) && name.size() > promiseSuffix.size() + 1;
+    return isPromise ? name.substr(1, name.size() - promiseSuffix.size() - 1) : name;
+}
+
+bool isPassingName(const std::string& name)
+{
+    return name.starts_with(passingPrefix);
+}
+
+bool isItemThere(const std::string& path)
+{
+    struct stat found;
+    return ::lstat(path.c_str(), &found) == 0 || ::lstat(promisePath(path).c_str(), &found) == 0;
+}
+
+} // namespace host::system

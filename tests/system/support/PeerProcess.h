@@ -1,0 +1,28 @@
+#pragma once
+
+#include <sys/types.h>
+
+#include <string>
+
+namespace testing_support {
+
+/// A process that is told line by line what to do and answers each line with one. It ends with this object.
+class PeerProcess {
+public:
+    PeerProcess(const std::string& program, const std::string& argument);
+    ~PeerProcess();
+    PeerProcess(const PeerProcess&) = delete;
+    PeerProcess& operator=(const PeerProcess&) = delete;
+
+    void send(const std::string& line);
+    /// Waits for the next line; empty when the process has ended.
+    std::string receive();
+    std::string ask(const std::string& line);
+    void signal(int number);
+
+private:
+    pid_t _process = -1;
+    int _toProcess = -1, _fromProcess = -1;
+};
+
+} // namespace testing_support
