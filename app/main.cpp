@@ -15,6 +15,7 @@
 #include "host/system/JsonUserDefaults.h"
 #include "host/system/LocalFileCoordinator.h"
 #include "host/system/MimeTypeRegistry.h"
+#include "host/system/PopplerDocuments.h"
 #include "host/system/PosixFileSystem.h"
 #include "host/system/ThreadedFolderLister.h"
 #include "host/system/TypePreviewSupport.h"
@@ -73,6 +74,7 @@ ServiceSet systemServices(const std::string& executable, const UserLocale& local
     set.nameSearch = std::make_shared<host::system::IndexedNameSearch>(set.dispatch, types);
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(types);
     set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
+    set.pagedDocumentOpener = std::make_shared<host::system::PopplerDocuments>();
     set.linkOpener = std::make_shared<host::system::GioLinkOpener>();
     set.keyedArchiver = std::make_shared<host::system::JsonKeyedArchiver>();
     return set;

@@ -16,6 +16,7 @@
 #include "platform/Localization.h"
 #include "platform/NameSearch.h"
 #include "platform/NotificationCenter.h"
+#include "platform/PagedDocument.h"
 #include "platform/PreviewSupport.h"
 #include "platform/StorageOffers.h"
 #include "platform/TypeRegistry.h"

@@ -21,6 +21,7 @@ class LinkOpener;
 class Localization;
 class NameSearch;
 class NotificationCenter;
+class PagedDocumentOpener;
 class PreviewSupport;
 class StorageOfferManager;
 class TypeRegistry;
@@ -45,6 +46,7 @@ struct ServiceSet {
     std::shared_ptr<Localization> localization;
     std::shared_ptr<NameSearch> nameSearch;
     std::shared_ptr<NotificationCenter> notificationCenter;
+    std::shared_ptr<PagedDocumentOpener> pagedDocumentOpener;
     std::shared_ptr<PreviewSupport> previewSupport;
     std::shared_ptr<StorageOfferManager> storageOfferManager;
     std::shared_ptr<TypeRegistry> typeRegistry;
@@ -76,6 +78,7 @@ public:
     Localization& localization() const { return *_set.localization; }
     NameSearch& nameSearch() const { return *_set.nameSearch; }
     NotificationCenter& notificationCenter() const { return *_set.notificationCenter; }
+    PagedDocumentOpener& pagedDocumentOpener() const { return *_set.pagedDocumentOpener; }
     PreviewSupport& previewSupport() const { return *_set.previewSupport; }
     StorageOfferManager& storageOfferManager() const { return *_set.storageOfferManager; }
     TypeRegistry& typeRegistry() const { return *_set.typeRegistry; }

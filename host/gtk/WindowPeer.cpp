@@ -1,6 +1,7 @@
 #include "host/gtk/WindowPeer.h"
 
 #include "host/gtk/LayerFactory.h"
+#include "host/gtk/PreviewNative.h"
 #include "platform/Localization.h"
 #include "platform/ui/ViewController.h"
 
@@ -37,6 +38,7 @@ WindowPeer::WindowPeer(
     build(application, size);
     _theme->setReference(_window.get());
     _theme->setOnChange([this] { themeChanged(); });
+    addPreviewMakers(*_context);
     _context->scheduler().attach(_window.get());
     ui::TextMeasurer::install(_measurer);
     connectWindow();

@@ -9,6 +9,8 @@ class GdkPixbufImageLoader : public platform::ImageLoader {
 public:
     platform::Result<platform::Image> load(
         const std::string& path, const platform::ImageLimits& limits) const override;
+    platform::Result<platform::Picture> loadPicture(const std::string& path,
+        const platform::ImageLimits& limits, const std::function<bool()>& isCancelled) const override;
 };
 
 } // namespace host::system

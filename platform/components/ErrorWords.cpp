@@ -2,6 +2,7 @@
 
 #include "platform/ImageLoader.h"
 #include "platform/Localization.h"
+#include "platform/PagedDocument.h"
 
 #include <cerrno>
 
@@ -26,6 +27,11 @@ std::string errorWords(const Error& error)
         return localized("The picture is too large to be shown here.");
     if (error.domain() == errorDomain::image)
         return localized("The picture is damaged.");
+    if (error.domain() == errorDomain::pages
+        && error.code() == static_cast<int>(PagesErrorCode::PasswordRequired))
+        return localized("The document is protected with a password.");
+    if (error.domain() == errorDomain::pages)
+        return localized("The document is damaged.");
     return localized("It could not be read.");
 }
 

@@ -1,8 +1,10 @@
 #pragma once
 
-#include "platform/Image.h"
+#include "platform/Geometry.h"
+#include "platform/ImageLoader.h"
+#include "platform/PagedDocument.h"
 
-#include <optional>
+#include <memory>
 #include <string>
 
 namespace platform::components {
@@ -10,18 +12,26 @@ namespace platform::components {
 /// What a preview shows of a document, ready to be put on the screen. A value.
 struct PreviewContent {
     enum class Kind {
-        Image, ///< `image`
-        Text, ///< `text`, with `note` when it was cut
+        Image, ///< `picture`
+        Text, ///< `text`
+        Pages, ///< `pages`
+        Sound, ///< what lies at `path`
+        Film, ///< what lies at `path`
         Summary, ///< icon, title and note (kind and size): there is no view for its type
-        InCloud, ///< as Summary, and `note` says that it is not downloaded
+        InCloud, ///< as Summary: it is not downloaded
         Failure, ///< `note` says why nothing can be shown
     };
 
     Kind kind = Kind::Summary;
-    std::optional<Image> image;
+    Picture picture;
     std::string text;
-    bool isMonospaced = false;
-    std::string iconName, title, note;
+    bool isSource = false; ///< of a text: it has a language of its own, and letters of one width
+    std::shared_ptr<PagedDocument> pages;
+    Size firstPage; ///< of pages, their own points
+    std::string path, fileName;
+    std::string iconName, title;
+    std::string note; ///< of a text or a picture: what is left out of it
+    bool canRetry = false; ///< of a failure: trying again may help
 };
 
 } // namespace platform::components

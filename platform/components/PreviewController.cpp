@@ -4,13 +4,16 @@
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/components/DisplayName.h"
-#include "platform/components/PlaceholderView.h"
 #include "platform/components/PreviewLoader.h"
-#include "platform/ui/ImageView.h"
-#include "platform/ui/Label.h"
+#include "platform/components/PreviewPictureView.h"
+#include "platform/components/PreviewScreenView.h"
+#include "platform/components/PreviewSearchBar.h"
+#include "platform/components/PreviewSummaryView.h"
+#include "platform/components/PreviewToolbar.h"
+#include "platform/components/PreviewViews.h"
+#include "platform/ui/NavigationController.h"
 #include "platform/ui/NavigationItem.h"
-#include "platform/ui/StandardColors.h"
-#include "platform/ui/TextView.h"
+#include "platform/ui/TextField.h"
 
 #include <chrono>
 #include <utility>
@@ -21,86 +24,36 @@ namespace {
 
 /// A document that is read sooner never shows that it was loading.
 constexpr auto loadingDelay = std::chrono::milliseconds(300);
-constexpr double noteHeight = 32;
 
-std::shared_ptr<ui::View> imageView(const PreviewContent& content)
+std::shared_ptr<PreviewSummaryView> summaryView(const PreviewSummaryView::Content& content)
 {
-    const auto view = std::make_shared<ui::ImageView>(content.image);
-    view->setContentMode(ui::ContentMode::AspectFit);
-    view->setAccessibilityLabel(content.title);
-    return view;
-}
-
-std::shared_ptr<ui::View> textView(const PreviewContent& content)
-{
-    const auto text = std::make_shared<ui::TextView>(content.text);
-    text->setSpacing(content.isMonospaced ? ui::TextSpacing::Monospaced : ui::TextSpacing::Proportional);
-    text->setAccessibilityLabel(content.title);
-    if (content.note.empty())
-        return text;
-    const auto note = std::make_shared<ui::Label>(content.note);
-    note->setFont(ui::Font::preferred(ui::TextStyle::Footnote));
-    note->setAlignment(ui::TextAlignment::Center);
-    note->setTextColor(ui::StandardColors::gray);
-    const auto view = std::make_shared<ui::View>();
-    for (const auto& part : std::initializer_list<std::shared_ptr<ui::View>>{note, text}) {
-        part->setPlacedByFrame(false);
-        view->addSubview(part);
-        ui::LayoutConstraint::activate({part->leadingAnchor().equalTo(view->leadingAnchor()),
-            part->trailingAnchor().equalTo(view->trailingAnchor())});
-    }
-    ui::LayoutConstraint::activate({note->topAnchor().equalTo(view->topAnchor()),
-        note->heightAnchor().equalToConstant(noteHeight), text->topAnchor().equalTo(note->bottomAnchor()),
-        text->bottomAnchor().equalTo(view->bottomAnchor())});
-    return view;
-}
-
-std::shared_ptr<ui::View> placeholder(const PlaceholderView::Content& content)
-{
-    const auto view = PlaceholderView::create();
+    const auto view = PreviewSummaryView::create();
     view->setContent(content);
     return view;
 }
 
-std::shared_ptr<ui::View> viewFor(const PreviewContent& content)
+bool isMedia(const PreviewContent& content)
 {
-    switch (content.kind) {
-    case PreviewContent::Kind::Image:
-        return imageView(content);
-    case PreviewContent::Kind::Text:
-        return textView(content);
-    case PreviewContent::Kind::Summary:
-    case PreviewContent::Kind::InCloud:
-    case PreviewContent::Kind::Failure:
-        break;
-    }
-    return placeholder({.iconName = content.iconName, .title = content.title, .message = content.note});
+    return content.kind == PreviewContent::Kind::Sound || content.kind == PreviewContent::Kind::Film;
 }
 
 } // namespace
 
 PreviewController::PreviewController() = default;
 
-PreviewController::~PreviewController() = default;
+PreviewController::~PreviewController()
+{
+    cancelLoad();
+}
+
+std::shared_ptr<PreviewController> PreviewController::self()
+{
+    return std::static_pointer_cast<PreviewController>(shared_from_this());
+}
 
 void PreviewController::setDataSource(std::weak_ptr<PreviewControllerDataSource> dataSource)
 {
     _dataSource = std::move(dataSource);
-}
-
-void PreviewController::loadView()
-{
-    setView(std::make_shared<ui::View>());
-}
-
-void PreviewController::viewDidLoad()
-{
-    if (_content)
-        setContentView(viewFor(*_content));
-    else if (_item)
-        showLoadingAfterDelay();
-    else
-        showNothing();
 }
 
 void PreviewController::setAdditionalRightBarButtonItems(ui::BarButtonItems items)
@@ -109,36 +62,108 @@ void PreviewController::setAdditionalRightBarButtonItems(ui::BarButtonItems item
     navigationItem().setRightItems(_additionalItems);
 }
 
+void PreviewController::setOpenInHandler(OpenInHandler handler)
+{
+    _openIn = std::move(handler);
+    if (_content)
+        showContent();
+}
+
+void PreviewController::loadView()
+{
+    _screen = PreviewScreenView::create();
+    const std::weak_ptr<PreviewController> weak = self();
+    _screen->toolbar()->setOnFind([weak] {
+        if (const auto screen = weak.lock())
+            screen->beginSearch();
+    });
+    _screen->searchBar()->setOnClose([weak] {
+        if (const auto screen = weak.lock())
+            screen->endSearch();
+    });
+    setView(_screen);
+}
+
+void PreviewController::viewDidLoad()
+{
+    if (_content)
+        showContent();
+    else if (_item)
+        showLoadingAfterDelay();
+    else
+        showNothing();
+}
+
+void PreviewController::viewWillAppear(bool animated)
+{
+    ViewController::viewWillAppear(animated);
+    // Its content was forgotten, or its reading was given up, when it was left.
+    if (_item && !_content && (!_cancelled || *_cancelled)) {
+        load(previewLimitsForMainScreen());
+        showLoadingAfterDelay();
+    }
+}
+
+void PreviewController::viewDidDisappear(bool animated)
+{
+    ViewController::viewDidDisappear(animated);
+    if (_previewView)
+        _previewView->stop();
+    if (navigationController())
+        return;
+    cancelLoad();
+    forgetContent();
+}
+
+bool PreviewController::backRequested()
+{
+    if (!_screen || !_screen->isSearching())
+        return ViewController::backRequested();
+    endSearch();
+    return true;
+}
+
 void PreviewController::reloadData()
 {
     const auto source = _dataSource.lock();
     const bool hasItem = source && source->numberOfPreviewItemsInPreviewController(*this) > 0;
     _item = hasItem ? std::optional(source->previewControllerPreviewItemAtIndex(*this, 0)) : std::nullopt;
-    _content = nullptr;
-    ++_generation;
+    cancelLoad();
+    forgetContent();
     setTitle(_item ? displayName(_item->lastPathComponent()) : std::string());
     if (!_item)
         return showNothing();
-    setContentView(nullptr);
-    load();
+    load(previewLimitsForMainScreen());
     showLoadingAfterDelay();
 }
 
 void PreviewController::refreshCurrentPreviewItem()
 {
     if (_item)
-        load();
+        load(previewLimitsForMainScreen());
 }
 
-void PreviewController::load()
+void PreviewController::cancelLoad()
 {
-    const auto self = std::static_pointer_cast<PreviewController>(shared_from_this());
+    ++_generation;
+    if (_cancelled)
+        *_cancelled = true;
+    // What has not begun yet goes with its queue.
+    _queue = nullptr;
+}
+
+void PreviewController::load(const PreviewLimits& limits)
+{
+    cancelLoad();
+    _cancelled = std::make_shared<std::atomic<bool>>(false);
     const auto main = services().dispatch().mainQueue();
-    // What an earlier load has not begun yet goes with its queue.
     _queue = services().dispatch().makeOperationQueue("preview", QualityOfService::UserInitiated);
-    _queue->addOperation([weak = std::weak_ptr(self), item = *_item, limits = previewLimitsForMainScreen(),
-                             generation = ++_generation, main] {
-        const auto content = std::make_shared<const PreviewContent>(loadPreview(item, limits));
+    _queue->addOperation([weak = std::weak_ptr(self()), item = *_item, limits, generation = _generation, main,
+                             cancelled = _cancelled] {
+        if (*cancelled)
+            return;
+        const auto content = std::make_shared<const PreviewContent>(
+            loadPreview(item, limits, [&] { return cancelled->load(); }));
         main->async([weak, content, generation] {
             if (const auto screen = weak.lock(); screen && screen->_generation == generation)
                 screen->show(content);
@@ -146,43 +171,154 @@ void PreviewController::load()
     });
 }
 
+void PreviewController::forgetContent()
+{
+    _content = nullptr;
+    _previewView = nullptr;
+    if (!_screen)
+        return;
+    _screen->setSearching(false);
+    _screen->searchBar()->field()->setText({});
+    _screen->setContent(nullptr);
+    connectPreview();
+}
+
+std::shared_ptr<const PreviewContent> PreviewController::withoutPlayer(
+    std::shared_ptr<const PreviewContent> content) const
+{
+    const auto delegate = _delegate.lock();
+    if (!isMedia(*content) || !delegate || delegate->previewControllerWantsDefaultMediaPlayer(*this, *_item))
+        return content;
+    auto summary = *content;
+    summary.kind = PreviewContent::Kind::Summary;
+    return std::make_shared<const PreviewContent>(std::move(summary));
+}
+
 void PreviewController::show(std::shared_ptr<const PreviewContent> content)
 {
-    _content = std::move(content);
+    _content = withoutPlayer(std::move(content));
     setTitle(_content->title);
-    setContentView(viewFor(*_content));
+    showContent();
 }
 
-void PreviewController::showNothing()
-{
-    setContentView(placeholder({.title = localized("Nothing to show")}));
-}
-
-void PreviewController::showLoadingAfterDelay()
-{
-    const auto self = std::static_pointer_cast<PreviewController>(shared_from_this());
-    auto& dispatch = services().dispatch();
-    dispatch.after(
-        loadingDelay, dispatch.mainQueue(), [weak = std::weak_ptr(self), generation = _generation] {
-            const auto screen = weak.lock();
-            if (screen && screen->_generation == generation && !screen->_content)
-                screen->setContentView(placeholder({.message = localized("Loading…"), .isBusy = true}));
-        });
-}
-
-void PreviewController::setContentView(const std::shared_ptr<ui::View>& contentView)
+void PreviewController::showContent()
 {
     // Before the screen is shown there is nothing to fill; viewDidLoad catches up.
     if (!isViewLoaded())
         return;
-    if (_contentView)
-        _contentView->removeFromSuperview();
-    _contentView = contentView;
-    if (!_contentView)
+    if (const auto preview = previewViewFor(*_content, _previewView))
+        showPreview(preview);
+    else
+        showSummary();
+}
+
+void PreviewController::showPreview(const std::shared_ptr<PreviewView>& preview)
+{
+    _previewView = preview;
+    const bool noteIsShown = _content->kind == PreviewContent::Kind::Text;
+    _screen->setNote(noteIsShown ? _content->note : std::string());
+    _screen->setContent(preview);
+    connectPreview();
+}
+
+void PreviewController::connectPreview()
+{
+    const auto shown = _screen->content() == _previewView ? _previewView : nullptr;
+    _screen->toolbar()->setPreview(shown);
+    _screen->toolbar()->setHidden(_screen->toolbar()->isEmpty());
+    _screen->searchBar()->setPreview(shown);
+    _screen->setNeedsLayout();
+    if (!shown)
         return;
-    _contentView->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
-    _contentView->setFrame(view()->bounds());
-    view()->addSubview(_contentView);
+    const std::weak_ptr<PreviewController> weak = self();
+    shown->setOnStateChange([weak] {
+        const auto screen = weak.lock();
+        if (!screen)
+            return;
+        screen->_screen->toolbar()->update();
+        screen->_screen->searchBar()->update();
+    });
+    shown->setOnFind([weak] {
+        if (const auto screen = weak.lock())
+            screen->beginSearch();
+    });
+    shown->setOnFailure([weak](const std::string& words) {
+        if (const auto screen = weak.lock())
+            screen->previewFailed(words);
+    });
+    if (const auto picture = std::dynamic_pointer_cast<PreviewPictureView>(shown))
+        picture->setOnNeedsPixels([weak] {
+            if (const auto screen = weak.lock())
+                screen->load(previewLimitsForCloseLook());
+        });
+}
+
+void PreviewController::previewFailed(const std::string& words)
+{
+    auto failure = *_content;
+    failure.kind = PreviewContent::Kind::Failure;
+    failure.note = words;
+    show(std::make_shared<const PreviewContent>(std::move(failure)));
+}
+
+void PreviewController::showSummary()
+{
+    const auto view =
+        summaryView({.iconName = _content->iconName, .title = _content->title, .message = _content->note});
+    std::vector<PreviewSummaryView::Action> actions;
+    const std::weak_ptr<PreviewController> weak = self();
+    if (_openIn && _content->kind != PreviewContent::Kind::InCloud)
+        actions.push_back({localized("Open in…"),
+            [weak, from = std::weak_ptr<ui::View>(view)] {
+                const auto screen = weak.lock();
+                if (screen && screen->_item && screen->_openIn)
+                    screen->_openIn(*screen->_item, from.lock());
+            },
+            true});
+    view->setActions(actions);
+    _screen->setSearching(false);
+    _screen->setNote({});
+    _screen->setContent(view);
+    connectPreview();
+}
+
+void PreviewController::showNothing()
+{
+    if (_screen)
+        _screen->setContent(summaryView({.title = localized("Nothing to show")}));
+}
+
+void PreviewController::showLoadingAfterDelay()
+{
+    auto& dispatch = services().dispatch();
+    dispatch.after(
+        loadingDelay, dispatch.mainQueue(), [weak = std::weak_ptr(self()), generation = _generation] {
+            const auto screen = weak.lock();
+            if (screen && screen->_generation == generation && !screen->_content && screen->_screen)
+                screen->_screen->setContent(summaryView({.message = localized("Loading…"), .isBusy = true}));
+        });
+}
+
+void PreviewController::beginSearch()
+{
+    if (!_screen || !_previewView || _screen->content() != _previewView || !_previewView->canSearch())
+        return;
+    _screen->setSearching(true);
+    _screen->searchBar()->field()->becomeFirstResponder();
+    if (_previewView->query().empty() && !_screen->searchBar()->field()->text().empty())
+        _previewView->setQuery(_screen->searchBar()->field()->text());
+}
+
+void PreviewController::endSearch()
+{
+    if (!_screen || !_screen->isSearching())
+        return;
+    _screen->searchBar()->field()->resignFirstResponder();
+    _screen->setSearching(false);
+    if (!_previewView)
+        return;
+    _previewView->setQuery({});
+    _previewView->takeFocus();
 }
 
 } // namespace platform::components

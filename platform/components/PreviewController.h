@@ -1,9 +1,12 @@
 #pragma once
 
 #include "platform/Url.h"
+#include "platform/components/PreviewControllerProtocols.h"
 #include "platform/ui/BarButtonItem.h"
 #include "platform/ui/ViewController.h"
 
+#include <atomic>
+#include <functional>
 #include <memory>
 #include <optional>
 
@@ -13,32 +16,14 @@ class OperationQueue;
 
 namespace platform::components {
 
-class PlaceholderView;
-class PreviewController;
+class PreviewScreenView;
+class PreviewView;
 struct PreviewContent;
+struct PreviewLimits;
 
-/// Answers what a preview shows. Main thread only.
-class PreviewControllerDataSource {
-public:
-    virtual ~PreviewControllerDataSource() = default;
-    virtual std::size_t numberOfPreviewItemsInPreviewController(
-        const PreviewController& controller) const = 0;
-    /// `index` is below the number of items.
-    virtual Url previewControllerPreviewItemAtIndex(
-        const PreviewController& controller, std::size_t index) const = 0;
-};
-
-/// What the preview may do with a document.
-class PreviewControllerDelegate {
-public:
-    virtual ~PreviewControllerDelegate() = default;
-    virtual bool previewControllerCanEditItem(const PreviewController&, const Url&) { return false; }
-    virtual bool previewControllerShouldSaveEditedItem(const PreviewController&, const Url&) { return false; }
-};
-
-/// The screen that shows one document: a picture, a text, or for everything else its icon with name, kind and
-/// size. Content is read off the main thread, within limits (see PreviewLoader); a document that is not
-/// downloaded stays where it is. Main thread only.
+/// The screen that shows one document: a picture, a text, pages, sound or a film, or for everything else its
+/// icon with name, kind and size. Content is read off the main thread, within limits (see PreviewLoader).
+/// Main thread only.
 class PreviewController : public ui::ViewController {
 public:
     PreviewController();
@@ -49,7 +34,8 @@ public:
 
     /// Asks the data source again and shows its first document.
     void reloadData();
-    /// Reads the document that is shown again; what is shown stays until the new content is there.
+    /// Reads the document that is shown again; what is shown stays until the new content is there, and the
+    /// page, the zoom and the place after that.
     void refreshCurrentPreviewItem();
     /// As of the last reload; nothing when the data source has no document.
     const std::optional<Url>& currentPreviewItem() const { return _item; }
@@ -58,26 +44,52 @@ public:
     const ui::BarButtonItems& additionalRightBarButtonItems() const { return _additionalItems; }
     void setAdditionalRightBarButtonItems(ui::BarButtonItems items);
 
+    /// Opens a document elsewhere, beginning at a view of the screen. Without it no such button is offered.
+    using OpenInHandler = std::function<void(const Url& item, const std::shared_ptr<ui::View>& from)>;
+    void setOpenInHandler(OpenInHandler handler);
+
     void loadView() override;
     void viewDidLoad() override;
+    void viewWillAppear(bool animated) override;
+    void viewDidDisappear(bool animated) override;
+    bool backRequested() override;
 
     /// What is shown now; null until something is.
     const std::shared_ptr<const PreviewContent>& content() const { return _content; }
+    /// The view of the document's content; null for what has none.
+    const std::shared_ptr<PreviewView>& previewView() const { return _previewView; }
+    const std::shared_ptr<PreviewScreenView>& screenView() const { return _screen; }
+
+    void beginSearch();
+    void endSearch();
 
 private:
-    void load();
+    using Token = std::shared_ptr<std::atomic<bool>>; ///< true: the load is no longer wanted
+
+    void load(const PreviewLimits& limits);
+    void cancelLoad();
+    void show(std::shared_ptr<const PreviewContent> content);
+    void showContent();
+    void showPreview(const std::shared_ptr<PreviewView>& preview);
+    void showSummary();
     void showNothing();
     void showLoadingAfterDelay();
-    void show(std::shared_ptr<const PreviewContent> content);
-    void setContentView(const std::shared_ptr<ui::View>& contentView);
+    void forgetContent();
+    void connectPreview();
+    void previewFailed(const std::string& words);
+    std::shared_ptr<const PreviewContent> withoutPlayer(std::shared_ptr<const PreviewContent> content) const;
+    std::shared_ptr<PreviewController> self();
 
     std::weak_ptr<PreviewControllerDataSource> _dataSource;
     std::weak_ptr<PreviewControllerDelegate> _delegate;
+    OpenInHandler _openIn;
     std::optional<Url> _item;
     std::shared_ptr<const PreviewContent> _content;
-    std::shared_ptr<ui::View> _contentView;
+    std::shared_ptr<PreviewScreenView> _screen;
+    std::shared_ptr<PreviewView> _previewView; ///< kept while a failure is shown, for the place in it
     ui::BarButtonItems _additionalItems;
     std::shared_ptr<OperationQueue> _queue;
+    Token _cancelled;
     unsigned _generation = 0; ///< of the latest load; an older one that ends is ignored
 };
 

@@ -4,7 +4,6 @@
 #include "platform/FileCoordinator.h"
 #include "platform/FileSystem.h"
 #include "platform/Formatters.h"
-#include "platform/ImageLoader.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"
@@ -13,7 +12,9 @@
 #include "platform/components/TextDecoding.h"
 #include "platform/ui/Screen.h"
 
+#include <filesystem>
 #include <fstream>
+#include <system_error>
 #include <utility>
 
 namespace platform::components {
@@ -61,6 +62,14 @@ PreviewContent failure(PreviewContent summary, const std::string& words)
     return summary;
 }
 
+std::string unreadableWords(const std::string& path)
+{
+    std::error_code problem;
+    if (!std::filesystem::exists(path, problem) && !problem)
+        return localized("It is no longer there.");
+    return localized("You do not have permission to see it.");
+}
+
 bool isOfKind(const AttributeMap& values, std::string_view type)
 {
     const auto* own = values.get<std::string>(AttributeKey::TypeIdentifier);
@@ -73,38 +82,80 @@ bool isInCloud(const AttributeMap& values)
     return status && *status == DownloadingStatus::NotDownloaded;
 }
 
-PreviewContent imageContent(PreviewContent content, const std::string& path, const PreviewLimits& limits)
+/// One reading of one document.
+struct Reading {
+    const PreviewLimits& limits;
+    const std::function<bool()>& isCancelled;
+};
+
+PreviewContent imageContent(PreviewContent content, const Reading& reading)
 {
-    const auto loaded = services().imageLoader().load(path,
-        {.maxWidth = limits.maxImageWidth, .maxHeight = limits.maxImageHeight, .scale = limits.imageScale});
+    const auto& limits = reading.limits;
+    const auto loaded = services().imageLoader().loadPicture(content.path,
+        {.maxWidth = limits.maxImageWidth,
+            .maxHeight = limits.maxImageHeight,
+            .scale = limits.imageScale,
+            .maxPixels = limits.maxImagePixels},
+        reading.isCancelled);
     if (!loaded.value)
         return failure(std::move(content),
             loaded.error ? errorWords(*loaded.error) : localized("It could not be read."));
     content.kind = Kind::Image;
-    content.image = loaded.value;
+    content.picture = *loaded.value;
+    content.note.clear();
     return content;
 }
 
-PreviewContent textContent(
-    PreviewContent content, const std::string& path, const PreviewLimits& limits, bool isPlain)
+std::string textNote(bool isCut, bool hasLongLines)
 {
-    std::ifstream file(path, std::ios::binary);
+    if (isCut)
+        return localized("Only the beginning of this document is shown.");
+    return hasLongLines ? localized("Only the beginnings of very long lines are shown.") : std::string();
+}
+
+PreviewContent textContent(PreviewContent content, const Reading& reading, bool isPlain)
+{
+    const auto limit = reading.limits.maxTextBytes;
+    std::ifstream file(content.path, std::ios::binary);
     // One byte more than is shown tells whether there is more.
-    std::string bytes(limits.maxTextBytes + 1, '\0');
+    std::string bytes(limit + 1, '\0');
     file.read(bytes.data(), static_cast<std::streamsize>(bytes.size()));
-    if (file.bad() || (file.fail() && !file.eof()))
-        return failure(std::move(content), localized("It could not be read."));
+    if (!file.is_open() || file.bad() || (file.fail() && !file.eof()))
+        return failure(std::move(content), unreadableWords(content.path));
     const auto count = static_cast<std::size_t>(file.gcount());
-    const bool isCut = count > limits.maxTextBytes;
-    bytes.resize(isCut ? limits.maxTextBytes : count);
+    const bool isCut = count > limit;
+    bytes.resize(isCut ? limit : count);
     content.kind = Kind::Text;
-    content.text = decodedText(bytes, isCut ? TextEnd::Cut : TextEnd::Whole);
-    content.isMonospaced = !isPlain;
-    content.note = isCut ? localized("Only the beginning of this document is shown.") : std::string();
+    const auto decoded = decodedText(bytes, isCut ? TextEnd::Cut : TextEnd::Whole);
+    content.text = withoutLongLines(decoded, reading.limits.maxLineBytes);
+    content.isSource = !isPlain;
+    content.note = textNote(isCut, content.text != decoded);
     return content;
 }
 
-PreviewContent readContent(const Url& url, const AttributeMap& values, const PreviewLimits& limits)
+PreviewContent pagesContent(PreviewContent content)
+{
+    const auto opened = services().pagedDocumentOpener().open(content.path);
+    if (!opened.value)
+        return failure(std::move(content),
+            opened.error ? errorWords(*opened.error) : localized("It could not be read."));
+    content.kind = Kind::Pages;
+    content.pages = *opened.value;
+    content.firstPage = content.pages->pageSize(0);
+    content.note.clear();
+    return content;
+}
+
+PreviewContent mediaContent(PreviewContent content, Kind kind)
+{
+    // The player reads it by itself, and tells less well what is the matter.
+    if (!std::ifstream(content.path, std::ios::binary).is_open())
+        return failure(std::move(content), unreadableWords(content.path));
+    content.kind = kind;
+    return content;
+}
+
+PreviewContent readContent(const Url& url, const AttributeMap& values, const Reading& reading)
 {
     auto content = summary(url, values);
     if (isInCloud(values)) {
@@ -116,14 +167,22 @@ PreviewContent readContent(const Url& url, const AttributeMap& values, const Pre
     const auto type = services().fileSystem().typeOfItem(url.path());
     if (!type)
         return failure(std::move(content), localized("It is no longer there."));
-    if (*type != FileType::Regular)
+    if (*type != FileType::Regular || reading.isCancelled())
         return content;
+    content.path = url.path();
+    content.fileName = url.lastPathComponent();
     if (isOfKind(values, typeIdentifier::image))
-        return imageContent(std::move(content), url.path(), limits);
+        return imageContent(std::move(content), reading);
+    if (isOfKind(values, typeIdentifier::pdf))
+        return pagesContent(std::move(content));
     if (isOfKind(values, typeIdentifier::text)) {
         const auto* identifier = values.get<std::string>(AttributeKey::TypeIdentifier);
-        return textContent(std::move(content), url.path(), limits, *identifier == "public.plain-text");
+        return textContent(std::move(content), reading, *identifier == "public.plain-text");
     }
+    if (isOfKind(values, typeIdentifier::movie))
+        return mediaContent(std::move(content), Kind::Film);
+    if (isOfKind(values, typeIdentifier::audio))
+        return mediaContent(std::move(content), Kind::Sound);
     return content;
 }
 
@@ -136,20 +195,34 @@ PreviewLimits previewLimitsForMainScreen()
     if (!screen)
         return limits;
     limits.imageScale = screen->scale;
-    limits.maxImageWidth = static_cast<int>(screen->bounds.width * screen->scale * 2);
-    limits.maxImageHeight = static_cast<int>(screen->bounds.height * screen->scale * 2);
+    limits.maxImageWidth = static_cast<int>(screen->bounds.width * screen->scale);
+    limits.maxImageHeight = static_cast<int>(screen->bounds.height * screen->scale);
     return limits;
 }
 
-PreviewContent loadPreview(const Url& url, const PreviewLimits& limits)
+PreviewLimits previewLimitsForCloseLook()
 {
+    PreviewLimits limits;
+    if (const auto& screen = ui::Screen::main())
+        limits.imageScale = screen->scale;
+    constexpr int longestSide = 32'000;
+    limits.maxImageWidth = limits.maxImageHeight = longestSide;
+    limits.maxImagePixels = 24'000'000;
+    return limits;
+}
+
+PreviewContent loadPreview(
+    const Url& url, const PreviewLimits& limits, const std::function<bool()>& isCancelled)
+{
+    static const std::function<bool()> never = [] { return false; };
+    const Reading reading{limits, isCancelled ? isCancelled : never};
     PreviewContent content;
     const auto refused = services().fileCoordinator().coordinateReading(
         url, ReadingOptions::ImmediatelyAvailableMetadataOnly, [&](const Url& location) {
             const auto values = services().cloudDocumentService().promisedItems().promisedItemResourceValues(
                 location, previewKeys);
             content = values.value
-                ? readContent(location, *values, limits)
+                ? readContent(location, *values, reading)
                 : failure(summary(location, {}),
                     values.error ? errorWords(*values.error) : localized("It could not be read."));
         });

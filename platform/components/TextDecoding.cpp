@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <optional>
 
 namespace platform::components {
 
@@ -68,12 +69,49 @@ std::string fromUtf16(std::string_view bytes, ByteOrder order)
     return text;
 }
 
-std::string fromLatin1(std::string_view bytes)
+std::string fromUtf32(std::string_view bytes, ByteOrder order)
+{
+    std::string text;
+    for (std::size_t i = 0; i + 4 <= bytes.size(); i += 4) {
+        const auto upper = unitAt(bytes.substr(i), order == ByteOrder::BigEndian ? 0 : 1, order);
+        const auto lower = unitAt(bytes.substr(i), order == ByteOrder::BigEndian ? 1 : 0, order);
+        const char32_t point = upper << 16 | lower;
+        const bool isPoint = point <= 0x10FFFF && !isHighSurrogate(point) && !isLowSurrogate(point);
+        append(text, isPoint ? point : replacementCharacter);
+    }
+    return text;
+}
+
+/// The order of UTF-16 without a mark: in the usual scripts' spaces, digits and line ends one half is NUL.
+std::optional<ByteOrder> guessedByteOrder(std::string_view bytes)
+{
+    constexpr std::size_t looked = 4096, fewest = 8;
+    if (bytes.size() < fewest)
+        return std::nullopt;
+    std::size_t nulls[2] = {0, 0};
+    const auto count = std::min(bytes.size(), looked) / 2 * 2;
+    for (std::size_t i = 0; i < count; ++i)
+        nulls[i % 2] += bytes[i] == '\0' ? 1 : 0;
+    const auto isMany = [&](std::size_t half) { return nulls[half] * 8 > count && nulls[1 - half] == 0; };
+    if (isMany(0))
+        return ByteOrder::BigEndian;
+    return isMany(1) ? std::optional(ByteOrder::LittleEndian) : std::nullopt;
+}
+
+/// What Windows-1252 has where Latin-1 has control characters; 0: nothing.
+constexpr char16_t windowsSigns[32] = {0x20AC, 0, 0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021, 0x02C6,
+    0x2030, 0x0160, 0x2039, 0x0152, 0, 0x017D, 0, 0, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022, 0x2013, 0x2014,
+    0x02DC, 0x2122, 0x0161, 0x203A, 0x0153, 0, 0x017E, 0x0178};
+
+std::string fromWindows1252(std::string_view bytes)
 {
     std::string text;
     text.reserve(bytes.size() + bytes.size() / 8);
-    for (const char byte : bytes)
-        append(text, static_cast<unsigned char>(byte));
+    for (const char character : bytes) {
+        const auto byte = static_cast<unsigned char>(character);
+        const bool isSign = byte >= 0x80 && byte < 0xA0 && windowsSigns[byte - 0x80] != 0;
+        append(text, isSign ? windowsSigns[byte - 0x80] : byte);
+    }
     return text;
 }
 
@@ -90,27 +128,53 @@ std::string_view withoutCutCharacter(std::string_view bytes)
     return bytes;
 }
 
-std::string fromUtf8OrLatin1(std::string_view bytes, TextEnd end)
+std::string fromUtf8OrWindows1252(std::string_view bytes, TextEnd end)
 {
     const auto whole = end == TextEnd::Cut ? withoutCutCharacter(bytes) : bytes;
-    return isValidUtf8(whole) ? std::string(whole) : fromLatin1(bytes);
+    return isValidUtf8(whole) ? std::string(whole) : fromWindows1252(bytes);
 }
 
 } // namespace
 
 std::string decodedText(std::string_view bytes, TextEnd end)
 {
+    using namespace std::string_view_literals;
     std::string text;
-    if (bytes.starts_with("\xFF\xFE"))
+    if (bytes.starts_with("\xFF\xFE\0\0"sv))
+        text = fromUtf32(bytes.substr(4), ByteOrder::LittleEndian);
+    else if (bytes.starts_with("\0\0\xFE\xFF"sv))
+        text = fromUtf32(bytes.substr(4), ByteOrder::BigEndian);
+    else if (bytes.starts_with("\xFF\xFE"))
         text = fromUtf16(bytes.substr(2), ByteOrder::LittleEndian);
     else if (bytes.starts_with("\xFE\xFF"))
         text = fromUtf16(bytes.substr(2), ByteOrder::BigEndian);
-    else if (bytes.starts_with("\xEF\xBB\xBF"))
-        text = fromUtf8OrLatin1(bytes.substr(3), end);
+    else if (const auto order = guessedByteOrder(bytes))
+        text = fromUtf16(bytes, *order);
     else
-        text = fromUtf8OrLatin1(bytes, end);
+        text = fromUtf8OrWindows1252(bytes.starts_with("\xEF\xBB\xBF") ? bytes.substr(3) : bytes, end);
     std::erase(text, '\0');
     return text;
+}
+
+std::string withoutLongLines(const std::string& text, std::size_t maxLineBytes)
+{
+    std::string cut;
+    cut.reserve(text.size());
+    for (std::size_t start = 0; start < text.size();) {
+        const auto found = text.find('\n', start);
+        const auto end = found == std::string::npos ? text.size() : found;
+        const std::string_view line(text.data() + start, end - start);
+        if (line.size() > maxLineBytes) {
+            cut += withoutCutCharacter(line.substr(0, maxLineBytes));
+            cut += "…";
+        } else {
+            cut += line;
+        }
+        if (end < text.size())
+            cut += '\n';
+        start = end + 1;
+    }
+    return cut;
 }
 
 } // namespace platform::components

@@ -1,14 +1,15 @@
-#include "platform/components/PlaceholderView.h"
 #include "platform/components/PreviewContent.h"
 #include "platform/components/PreviewController.h"
 #include "platform/components/PreviewLoader.h"
+#include "platform/components/PreviewPictureView.h"
+#include "platform/components/PreviewScreenView.h"
+#include "platform/components/PreviewSummaryView.h"
+#include "platform/components/PreviewTextView.h"
+#include "platform/components/PreviewToolbar.h"
 #include "platform/components/TextDecoding.h"
-#include "platform/ui/ImageView.h"
-#include "platform/ui/Label.h"
 #include "platform/ui/Screen.h"
-#include "platform/ui/TextView.h"
-#include "platform/ui/ViewVisitor.h"
 #include "tests/components/support/ComponentsFixture.h"
+#include "tests/support/SimplePdf.h"
 
 #include <gmock/gmock.h>
 #include <sys/stat.h>
@@ -48,10 +49,10 @@ protected:
         documents->urls = std::move(urls);
         screen->reloadData();
     }
-    const PlaceholderView::Content& placeholder() const
+    const PreviewSummaryView::Content& summary() const
     {
-        const auto view = std::dynamic_pointer_cast<PlaceholderView>(screen->view()->subviews().back());
-        static const PlaceholderView::Content none;
+        const auto view = std::dynamic_pointer_cast<PreviewSummaryView>(screen->screenView()->content());
+        static const PreviewSummaryView::Content none;
         return view ? view->content() : none;
     }
 
@@ -70,12 +71,17 @@ struct Row {
 
 TEST_F(Preview, ChoosesWhatToShowByTheDocument)
 {
+    const auto secret = testing_support::passwordPdf(), plan = testing_support::simplePdf({"one", "two"});
     const Row rows[] = {
+        {"Good.pdf", plan, Kind::Pages, ""},
         {"Picture.png", twoPixels, Kind::Image, ""},
         {"Broken.png", "no picture at all", Kind::Failure, "damaged"},
         {"Notes.txt", "Hello", Kind::Text, ""},
         {"Empty.txt", "", Kind::Text, ""},
-        {"Plan.pdf", "%PDF-1.4", Kind::Summary, "PDF document · 8 bytes"},
+        {"Plan.pdf", "%PDF-1.4", Kind::Failure, "damaged"},
+        {"Secret.pdf", secret, Kind::Failure, "password"},
+        {"Song.wav", "RIFF", Kind::Sound, "4 bytes"},
+        {"Film.mp4", "ftyp", Kind::Film, "4 bytes"},
         {"Unknown.xyz", "bytes", Kind::Summary, "5 bytes"},
     };
     for (const auto& row : rows) {
@@ -95,12 +101,12 @@ TEST_F(Preview, SaysWhyADocumentCannotBeShown)
     show({drive.url("Gone.txt")});
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(screen->content()->kind, Kind::Failure);
-    EXPECT_FALSE(placeholder().message.empty());
+    EXPECT_FALSE(summary().message.empty());
 
     show({drive.writePromise("Far.txt", {})});
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(screen->content()->kind, Kind::InCloud);
-    EXPECT_THAT(placeholder().message, HasSubstr("in the cloud"));
+    EXPECT_THAT(summary().message, HasSubstr("in the cloud"));
     EXPECT_FALSE(std::filesystem::exists(drive.url("Far.txt").path()));
 
     // A pipe would keep a reader waiting for ever.
@@ -110,13 +116,15 @@ TEST_F(Preview, SaysWhyADocumentCannotBeShown)
     EXPECT_EQ(screen->content()->kind, Kind::Summary);
 
     show({});
-    EXPECT_EQ(placeholder().title, "Nothing to show");
+    EXPECT_EQ(summary().title, "Nothing to show");
 }
 
 TEST_F(Preview, CutsLongTextsAndSaysSo)
 {
     const PreviewLimits limits;
     std::string text(limits.maxTextBytes - 1, 'x');
+    for (std::size_t line = 100; line < text.size(); line += 100)
+        text[line] = '\n';
     drive.writeDocument("Fits.txt", text + "y");
     drive.writeDocument("Long.txt", text + "\xC3\xA4 and more");
     const auto whole = loadPreview(drive.url("Fits.txt"), limits);
@@ -126,30 +134,39 @@ TEST_F(Preview, CutsLongTextsAndSaysSo)
     EXPECT_EQ(cut.text.size(), limits.maxTextBytes - 1);
     EXPECT_THAT(cut.note, HasSubstr("Only the beginning"));
 
+    const auto lines = loadPreview(
+        drive.writeDocument("Line.txt", "short\n" + std::string(limits.maxLineBytes + 1, 'x') + "\nend"),
+        limits);
+    EXPECT_THAT(lines.text, testing::EndsWith("x…\nend"));
+    EXPECT_THAT(lines.note, HasSubstr("very long lines"));
+
     show({drive.url("Long.txt")});
     drive.dispatch->runUntilIdle();
     screen->view()->layoutIfNeeded();
-    const auto parts = screen->view()->subviews().back()->subviews();
-    ASSERT_EQ(parts.size(), 2U);
-    EXPECT_EQ(std::dynamic_pointer_cast<ui::Label>(parts[0])->text(), cut.note);
-    EXPECT_EQ(parts[1]->frame().maxY(), 600);
-    EXPECT_EQ(parts[1]->frame().width, 360);
+    EXPECT_EQ(screen->screenView()->note(), cut.note);
+    const auto place = screen->previewView()->frame();
+    EXPECT_GT(place.y, 0);
+    EXPECT_EQ(place.maxY(), 600 - PreviewToolbar::barHeight);
+    EXPECT_EQ(place.width, 360);
 }
 
-TEST_F(Preview, ShowsPicturesInAtMostTwiceTheScreensPixels)
+TEST_F(Preview, ReadsNoMorePixelsThanAreSeen)
 {
     ui::Screen::setMain(ui::Screen{{0, 0, 10, 5}, 2, ui::UserInterfaceIdiom::Phone, {}});
     std::string picture = "P6 100 100 255\n";
     picture.append(30'000, 'z');
     show({drive.writeDocument("Large.png", picture)});
     drive.dispatch->runUntilIdle();
-    ui::Screen::setMain(std::nullopt);
-    ASSERT_EQ(screen->content()->kind, Kind::Image);
-    EXPECT_EQ(screen->content()->image->pixelHeight(), 20);
-    const auto view = std::dynamic_pointer_cast<ui::ImageView>(screen->view()->subviews().back());
+    const auto view = std::dynamic_pointer_cast<PreviewPictureView>(screen->previewView());
     ASSERT_TRUE(view);
-    EXPECT_EQ(view->contentMode(), ui::ContentMode::AspectFit);
-    EXPECT_EQ(view->frame().height, 600);
+    EXPECT_EQ(view->picture().frames.front().image.pixelHeight(), 10);
+    // Seen closer, it is read once more.
+    view->userSeesPixels(11);
+    view->userSeesPixels(50);
+    drive.dispatch->runUntilIdle();
+    ui::Screen::setMain(std::nullopt);
+    EXPECT_EQ(screen->previewView(), view);
+    EXPECT_EQ(view->picture().frames.front().image.pixelHeight(), 100);
 }
 
 TEST_F(Preview, IgnoresWhatArrivesForAnEarlierDocument)
@@ -167,7 +184,6 @@ TEST_F(Preview, IgnoresWhatArrivesForAnEarlierDocument)
     EXPECT_EQ(screen->content()->text, "second");
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(screen->content()->text, "second, changed");
-    EXPECT_EQ(screen->view()->subviews().size(), 1U);
 }
 
 TEST_F(Preview, ShowsThatItIsLoadingOnlyAfterAWhile)
@@ -177,11 +193,12 @@ TEST_F(Preview, ShowsThatItIsLoadingOnlyAfterAWhile)
     late->setDataSource(documents);
     late->reloadData();
     drive.dispatch->runUntilIdle();
-    const auto text = std::dynamic_pointer_cast<ui::TextView>(late->view()->subviews().back());
+    EXPECT_EQ(late->view()->frame().width, 0);
+    const auto text = std::dynamic_pointer_cast<PreviewTextView>(late->screenView()->content());
     ASSERT_TRUE(text);
-    EXPECT_EQ(text->text(), "Hello");
+    EXPECT_EQ(text->text().text, "Hello");
     drive.dispatch->advance(1);
-    EXPECT_EQ(late->view()->subviews().back(), text);
+    EXPECT_EQ(late->screenView()->content(), text);
 }
 
 struct TextRow {
@@ -200,12 +217,16 @@ TEST(TextDecoding, UnderstandsTheUsualEncodings)
         {"Latin-1", "Gr\xFC\xDF", TextEnd::Whole, "Grüß"},
         {"UTF-16 little-endian", "\xFF\xFEh\0\xFC\0"sv, TextEnd::Whole, "hü"},
         {"UTF-16 big-endian, beyond the first plane", "\xFE\xFF\xD8\x3D\xDE\x00"sv, TextEnd::Whole, "😀"},
+        {"UTF-16 without a mark", "h\0e\0y\0\n\0"sv, TextEnd::Whole, "hey\n"},
+        {"UTF-32 little-endian", "\xFF\xFE\0\0\xFC\0\0\0"sv, TextEnd::Whole, "ü"},
+        {"UTF-32 big-endian, no character", "\0\0\xFE\xFF\0\x11\0\0"sv, TextEnd::Whole, "\uFFFD"},
+        {"Windows-1252", "\x93q\x94 \x80", TextEnd::Whole, "“q” €"},
         {"UTF-16 with a lone surrogate", "\xFE\xFF\xDE\x00\0a"sv, TextEnd::Whole, "\uFFFDa"},
         {"UTF-16 with half a unit", "\xFF\xFEh\0i"sv, TextEnd::Whole, "h"},
         {"UTF-8 cut within a character", "ab\xE2\x82", TextEnd::Cut, "ab"},
         {"UTF-8 cut between characters", "ab\xE2\x82\xAC", TextEnd::Cut, "ab€"},
         {"UTF-16 cut within a pair", "\xFE\xFF\0a\xD8\x3D"sv, TextEnd::Cut, "a"},
-        {"whole, with the end of a character missing", "ab\xE2\x82", TextEnd::Whole, "abâ\u0082"},
+        {"whole, with the end of a character missing", "ab\xE2\x82", TextEnd::Whole, "abâ‚"},
         {"NUL characters", "a\0b"sv, TextEnd::Whole, "ab"},
         {"nothing", "", TextEnd::Cut, ""},
     };

@@ -50,6 +50,7 @@ BrowserFixture::BrowserFixture()
     set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(drive.dispatch, types, "en_US");
     set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
     set.imageLoader = borrowed(_driveServices.imageLoader());
+    set.pagedDocumentOpener = borrowed(_driveServices.pagedDocumentOpener());
     set.keyValueStore = borrowed(_driveServices.keyValueStore());
     set.keyedArchiver = borrowed(_driveServices.keyedArchiver());
     set.localization = englishTexts();

@@ -90,6 +90,7 @@ ComponentsFixture::ComponentsFixture()
     _set.linkOpener = links;
     _set.localization = borrowed(_driveServices.localization());
     _set.notificationCenter = drive.notifications;
+    _set.pagedDocumentOpener = borrowed(_driveServices.pagedDocumentOpener());
     _set.previewSupport = borrowed(_driveServices.previewSupport());
     _set.storageOfferManager = borrowed(_driveServices.storageOfferManager());
     _set.typeRegistry = borrowed(_driveServices.typeRegistry());

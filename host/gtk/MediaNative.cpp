@@ -1,0 +1,120 @@
+#include "host/gtk/MediaNative.h"
+
+#include "host/gtk/MediaSupport.h"
+
+#include <utility>
+
+namespace host::gtk {
+
+using platform::components::PreviewMediaView;
+
+namespace {
+
+constexpr int iconSide = 128, spacing = 18; ///< points
+
+} // namespace
+
+MediaNative::MediaNative(const std::shared_ptr<PreviewMediaView>& view)
+    : _view(view)
+    , _box(ObjectRef<GtkWidget>::retain(gtk_box_new(GTK_ORIENTATION_VERTICAL, spacing)))
+{
+}
+
+MediaNative::~MediaNative()
+{
+    close();
+}
+
+void MediaNative::start()
+{
+    previewContentDidChange();
+}
+
+void MediaNative::previewContentDidChange()
+{
+    close();
+    MediaSupport::check([weak = weak_from_this(), generation = ++_generation](const std::string& missing) {
+        const auto self = std::static_pointer_cast<MediaNative>(weak.lock());
+        const auto view = self && self->_generation == generation ? self->_view.lock() : nullptr;
+        if (!view)
+            return;
+        if (missing.empty())
+            self->open();
+        else
+            view->nativeFailed(missing);
+    });
+}
+
+void MediaNative::open()
+{
+    const auto view = _view.lock();
+    if (!view)
+        return;
+    const auto& media = view->media();
+    _stream = ObjectRef<GtkMediaStream>::adopt(gtk_media_file_new_for_filename(media.path.c_str()));
+    _streamConnections.push_back(connectNotify(_stream.get(), "notify::error", [this] { checkError(); }));
+    if (media.isFilm)
+        showFilm();
+    else
+        showSound(media);
+}
+
+void MediaNative::showFilm()
+{
+    _player = gtk_video_new_for_media_stream(_stream.get());
+    gtk_widget_set_vexpand(_player, TRUE);
+    gtk_widget_set_hexpand(_player, TRUE);
+    gtk_box_append(GTK_BOX(widget()), _player);
+}
+
+void MediaNative::showSound(const PreviewMediaView::Content& media)
+{
+    _player = gtk_box_new(GTK_ORIENTATION_VERTICAL, spacing);
+    gtk_widget_set_valign(_player, GTK_ALIGN_CENTER);
+    gtk_widget_set_vexpand(_player, TRUE);
+    gtk_widget_set_halign(_player, GTK_ALIGN_CENTER);
+    auto* icon = gtk_image_new_from_icon_name(media.iconName.c_str());
+    gtk_image_set_pixel_size(GTK_IMAGE(icon), iconSide);
+    auto* title = gtk_label_new(media.title.c_str());
+    gtk_widget_add_css_class(title, "title-2");
+    gtk_label_set_wrap(GTK_LABEL(title), TRUE);
+    gtk_label_set_wrap_mode(GTK_LABEL(title), PANGO_WRAP_WORD_CHAR);
+    gtk_label_set_justify(GTK_LABEL(title), GTK_JUSTIFY_CENTER);
+    auto* controls = gtk_media_controls_new(_stream.get());
+    gtk_widget_set_size_request(controls, 300, -1);
+    for (auto* part : {icon, title, controls})
+        gtk_box_append(GTK_BOX(_player), part);
+    gtk_box_append(GTK_BOX(widget()), _player);
+}
+
+void MediaNative::checkError()
+{
+    const auto* error = gtk_media_stream_get_error(_stream.get());
+    const auto view = _view.lock();
+    if (error && view)
+        view->nativeFailed(MediaSupport::wordsFor(g_quark_to_string(error->domain), error->code));
+}
+
+void MediaNative::close()
+{
+    _streamConnections.clear();
+    previewShouldStop();
+    if (_player)
+        gtk_box_remove(GTK_BOX(widget()), std::exchange(_player, nullptr));
+    if (_stream)
+        gtk_media_file_clear(GTK_MEDIA_FILE(_stream.get()));
+    _stream.reset();
+}
+
+void MediaNative::previewShouldStop()
+{
+    if (_stream)
+        gtk_media_stream_pause(_stream.get());
+}
+
+void MediaNative::previewShouldTakeFocus()
+{
+    gtk_widget_child_focus(widget(), GTK_DIR_TAB_FORWARD);
+}
+
+} // namespace host::gtk

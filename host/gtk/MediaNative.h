@@ -1,0 +1,37 @@
+#pragma once
+
+#include "host/gtk/PreviewNative.h"
+#include "platform/components/PreviewMediaView.h"
+
+namespace host::gtk {
+
+/// Plays sound and films in the toolkit's player.
+class MediaNative : public PreviewNative {
+public:
+    explicit MediaNative(const std::shared_ptr<platform::components::PreviewMediaView>& view);
+    ~MediaNative() override;
+
+    GtkWidget* widget() const override { return _box.get(); }
+    GtkMediaStream* stream() const { return _stream.get(); } ///< null: none yet
+    void start() override;
+
+    void previewContentDidChange() override;
+    void previewShouldStop() override;
+    void previewShouldTakeFocus() override;
+
+private:
+    void open();
+    void close();
+    void showFilm();
+    void showSound(const platform::components::PreviewMediaView::Content& media);
+    void checkError();
+
+    std::weak_ptr<platform::components::PreviewMediaView> _view;
+    ObjectRef<GtkWidget> _box;
+    ObjectRef<GtkMediaStream> _stream;
+    GtkWidget* _player = nullptr; ///< in the box
+    unsigned _generation = 0; ///< of the content; an answer for an older one is ignored
+    SignalConnections _connections, _streamConnections;
+};
+
+} // namespace host::gtk

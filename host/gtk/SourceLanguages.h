@@ -1,0 +1,22 @@
+#pragma once
+
+#include "host/gtk/ObjectRef.h"
+
+#include <gtksourceview/gtksource.h>
+
+#include <functional>
+#include <string>
+
+namespace host::gtk {
+
+/// The languages of sources that the desktop knows how to colour.
+namespace SourceLanguages {
+
+/// Finds the language of a file name, off the main thread (the first time, all descriptions are read); the
+/// answer comes on the main queue, null for none. Main thread.
+using Answer = std::function<void(const ObjectRef<GtkSourceLanguage>& language)>;
+void guess(const std::string& fileName, Answer answer);
+
+} // namespace SourceLanguages
+
+} // namespace host::gtk

@@ -1,0 +1,59 @@
+#pragma once
+
+#include "host/gtk/PreviewNative.h"
+#include "platform/components/PreviewTextView.h"
+
+#include <gtksourceview/gtksource.h>
+
+#include <string>
+
+namespace host::gtk {
+
+/// Shows a text to be read and selected, sources in the colours of their language. A long text is put in
+/// piece by piece; of a text that has changed, only the part that differs.
+class TextNative : public PreviewNative {
+public:
+    explicit TextNative(const std::shared_ptr<platform::components::PreviewTextView>& view);
+    ~TextNative() override;
+
+    GtkWidget* widget() const override { return _window.get(); }
+    GtkTextView* textView() const { return GTK_TEXT_VIEW(_text); }
+    void start() override;
+
+    void previewContentDidChange() override;
+    void previewZoomDidChange() override;
+    void previewQueryDidChange() override;
+    void previewShouldShowMatch(platform::components::MatchStep step) override;
+    void previewShouldTakeFocus() override;
+
+private:
+    void build();
+    void addGestures();
+    void zoomBy(double factor);
+    void replaceText(const std::string& text);
+    void insertPiece();
+    void finishText();
+    void followTheme();
+    void findLanguage();
+    void searchFrom(const GtkTextIter& place, platform::components::MatchStep step);
+    void matched(GAsyncResult* result, platform::components::MatchStep step);
+    void publishSearch();
+
+    std::weak_ptr<platform::components::PreviewTextView> _view;
+    ObjectRef<GtkWidget> _window;
+    ObjectRef<GtkSourceBuffer> _buffer;
+    ObjectRef<GtkSourceSearchContext> _search;
+    ObjectRef<GtkSourceLanguage> _language;
+    ObjectRef<GtkCssProvider> _style;
+    GtkWidget* _text;
+    std::string _shown; ///< what the buffer has or is about to have
+    std::size_t _inserted = 0, _insertEnd = 0; ///< bytes of `_shown`: what is missing in the buffer
+    ObjectRef<GtkTextMark> _insertPlace;
+    guint _inserting = 0;
+    std::string _fileName;
+    double _pinchStart = 1;
+    SignalConnection _onCount;
+    SignalConnections _connections;
+};
+
+} // namespace host::gtk

@@ -1,0 +1,12 @@
+#pragma once
+
+#include <cstddef>
+#include <string_view>
+
+namespace host::system {
+
+/// Counts the frames of a GIF without decoding them; 0 for anything else. A file that breaks off has those
+/// that begin.
+std::size_t gifFrameCount(std::string_view bytes);
+
+} // namespace host::system

@@ -1,0 +1,13 @@
+#pragma once
+
+#include "platform/PagedDocument.h"
+
+namespace host::system {
+
+/// Opens PDF documents with Poppler. A page is drawn by the thread that asks, so ask on a worker.
+class PopplerDocuments : public platform::PagedDocumentOpener {
+public:
+    platform::Result<std::shared_ptr<platform::PagedDocument>> open(const std::string& path) const override;
+};
+
+} // namespace host::system

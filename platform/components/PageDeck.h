@@ -1,0 +1,88 @@
+#pragma once
+
+#include "platform/Geometry.h"
+#include "platform/Image.h"
+
+#include <cstddef>
+#include <map>
+#include <optional>
+#include <vector>
+
+namespace platform::components {
+
+/// Pages one below the other, and the pictures that are kept of them. The widest page fits the window at a
+/// zoom of 1. "Content" points are the interface's from the top left corner of all the pages; "page" points
+/// are the document's own. A value that knows no thread.
+class PageDeck {
+public:
+    static constexpr double gap = 12; ///< between pages and around them, content points at a zoom of 1
+    static constexpr double widestFit = 900; ///< a page is not made wider than this to fit
+    static constexpr double maxPagePixels = 6e6; ///< a picture of a whole page has no more
+    static constexpr std::size_t maxPictureBytes = 64 << 20; ///< of all pictures that are kept
+
+    void setPages(std::vector<Size> pages); ///< pictures of pages that keep their size stay, as stale ones
+    /// `scale` is device pixels to a point.
+    void setWindow(double width, double scale);
+    /// Everything grows with the zoom, gaps included, so that a place in the content is a part of its size.
+    void setZoom(double zoom);
+    double zoom() const { return _zoom; }
+
+    std::size_t pageCount() const { return _pages.size(); }
+    Size contentSize() const;
+    Rect pageFrame(std::size_t page) const; ///< in the content
+    std::optional<std::size_t> pageAt(double y) const; ///< the nearest one
+    struct PageRange {
+        std::size_t first = 0, end = 0;
+    };
+    PageRange pagesIn(const Rect& visible) const;
+    /// The page that somebody who sees this is reading.
+    std::size_t currentPage(const Rect& visible) const;
+    Point toPage(std::size_t page, Point content) const;
+    Rect toContent(std::size_t page, const Rect& onPage) const;
+
+    /// A picture to be drawn: of a whole page, or of the part that is seen.
+    struct Task {
+        std::size_t page = 0;
+        double pixelsPerPoint = 1;
+        Rect part; ///< page points
+        bool isDetail = false;
+    };
+    /// What is missing most for somebody who sees this; nothing when all is there.
+    std::optional<Task> nextTask(const Rect& visible) const;
+    /// Keeps what came of a task; without a picture the page is not asked for again.
+    void finish(const Task& task, std::optional<Image> picture, const Rect& visible);
+    void forgetPictures(); ///< what is kept is shown until it is drawn again
+
+    /// The picture of a page, perhaps too coarse; null: none yet.
+    const Image* picture(std::size_t page) const;
+    bool isBroken(std::size_t page) const;
+    struct Detail {
+        Task task;
+        Image picture;
+    };
+    const std::optional<Detail>& detail() const { return _detail; } ///< lies over its page
+
+private:
+    struct Kept {
+        std::optional<Image> picture; ///< nothing: the page cannot be drawn
+        double pixelsPerPoint = 0; ///< 0: to be drawn again
+    };
+
+    void place();
+    double shownGap() const { return gap * _zoom; }
+    double pointsPerPagePoint() const;
+    double wantedPixelsPerPoint(std::size_t page) const;
+    double fullPixelsPerPoint() const { return pointsPerPagePoint() * _scale; }
+    std::optional<Task> detailTask(const Rect& visible) const;
+    Rect visiblePart(std::size_t page, const Rect& visible) const;
+    void evict(const Rect& visible);
+
+    std::vector<Size> _pages;
+    std::vector<double> _tops;
+    double _widest = 1, _bottom = 0;
+    double _windowWidth = 360, _scale = 1, _zoom = 1;
+    std::map<std::size_t, Kept> _kept;
+    std::optional<Detail> _detail;
+};
+
+} // namespace platform::components

@@ -1,0 +1,35 @@
+#pragma once
+
+#include "platform/Url.h"
+
+#include <cstddef>
+
+namespace platform::components {
+
+class PreviewController;
+
+/// Answers what a preview shows. Main thread only.
+class PreviewControllerDataSource {
+public:
+    virtual ~PreviewControllerDataSource() = default;
+    virtual std::size_t numberOfPreviewItemsInPreviewController(
+        const PreviewController& controller) const = 0;
+    /// `index` is below the number of items.
+    virtual Url previewControllerPreviewItemAtIndex(
+        const PreviewController& controller, std::size_t index) const = 0;
+};
+
+/// What the preview may do with a document. Main thread only.
+class PreviewControllerDelegate {
+public:
+    virtual ~PreviewControllerDelegate() = default;
+    virtual bool previewControllerCanEditItem(const PreviewController&, const Url&) { return false; }
+    virtual bool previewControllerShouldSaveEditedItem(const PreviewController&, const Url&) { return false; }
+    /// Whether sound and films play in the platform's media player; otherwise they show as icon and name.
+    virtual bool previewControllerWantsDefaultMediaPlayer(const PreviewController&, const Url&)
+    {
+        return true;
+    }
+};
+
+} // namespace platform::components

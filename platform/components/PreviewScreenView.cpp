@@ -1,0 +1,94 @@
+#include "platform/components/PreviewScreenView.h"
+
+#include "platform/components/PreviewSearchBar.h"
+#include "platform/components/PreviewToolbar.h"
+#include "platform/ui/Label.h"
+#include "platform/ui/StandardColors.h"
+
+#include <algorithm>
+
+namespace platform::components {
+
+namespace {
+
+constexpr double noteHeight = 32;
+
+} // namespace
+
+std::shared_ptr<PreviewScreenView> PreviewScreenView::create()
+{
+    const auto view = std::make_shared<PreviewScreenView>();
+    view->build();
+    return view;
+}
+
+void PreviewScreenView::build()
+{
+    _searchBar = PreviewSearchBar::create();
+    _searchBar->setHidden(true);
+    _toolbar = PreviewToolbar::create();
+    _toolbar->setHidden(true);
+    _note = std::make_shared<ui::Label>();
+    _note->setFont(ui::Font::preferred(ui::TextStyle::Footnote));
+    _note->setAlignment(ui::TextAlignment::Center);
+    _note->setTextColor(ui::StandardColors::gray);
+    _note->setHidden(true);
+    addSubview(_searchBar);
+    addSubview(_note);
+    addSubview(_toolbar);
+}
+
+const std::string& PreviewScreenView::note() const
+{
+    return _note->text();
+}
+
+void PreviewScreenView::setNote(const std::string& note)
+{
+    _note->setText(note);
+    _note->setHidden(note.empty());
+    setNeedsLayout();
+}
+
+bool PreviewScreenView::isSearching() const
+{
+    return !_searchBar->isHidden();
+}
+
+void PreviewScreenView::setSearching(bool searching)
+{
+    _searchBar->setHidden(!searching);
+    setNeedsLayout();
+}
+
+void PreviewScreenView::setContent(const std::shared_ptr<ui::View>& content)
+{
+    if (content == _content)
+        return;
+    if (_content)
+        _content->removeFromSuperview();
+    _content = content;
+    // Between the bars, so that the focus goes from top to bottom.
+    if (_content)
+        insertSubview(_content, 2);
+    setNeedsLayout();
+}
+
+void PreviewScreenView::layoutSubviews()
+{
+    const double width = bounds().width;
+    double top = 0;
+    const auto place = [&](ui::View& view, double height) {
+        view.setFrame({0, top, width, height});
+        top += view.isHidden() ? 0 : height;
+    };
+    place(*_searchBar, PreviewSearchBar::barHeight);
+    place(*_note, noteHeight);
+    const double below = _toolbar->isHidden() ? 0 : PreviewToolbar::barHeight;
+    if (_content)
+        place(*_content, std::max(0.0, bounds().height - top - below));
+    top = bounds().height - PreviewToolbar::barHeight;
+    place(*_toolbar, PreviewToolbar::barHeight);
+}
+
+} // namespace platform::components

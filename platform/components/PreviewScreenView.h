@@ -1,0 +1,44 @@
+#pragma once
+
+#include "platform/ui/View.h"
+
+#include <memory>
+#include <string>
+
+namespace platform::ui {
+class Label;
+} // namespace platform::ui
+
+namespace platform::components {
+
+class PreviewSearchBar;
+class PreviewToolbar;
+
+/// The whole of a preview's screen: search bar, a note on what is left out, the content, the toolbar, from
+/// top to bottom. Main thread only.
+class PreviewScreenView : public ui::View {
+public:
+    static std::shared_ptr<PreviewScreenView> create();
+    using ui::View::View;
+
+    const std::shared_ptr<PreviewSearchBar>& searchBar() const { return _searchBar; }
+    const std::shared_ptr<PreviewToolbar>& toolbar() const { return _toolbar; }
+    const std::shared_ptr<ui::View>& content() const { return _content; }
+    void setContent(const std::shared_ptr<ui::View>& content); ///< null: none
+    const std::string& note() const;
+    void setNote(const std::string& note); ///< empty: none
+    bool isSearching() const;
+    void setSearching(bool searching);
+
+    void layoutSubviews() override;
+
+private:
+    void build();
+
+    std::shared_ptr<PreviewSearchBar> _searchBar;
+    std::shared_ptr<PreviewToolbar> _toolbar;
+    std::shared_ptr<ui::Label> _note;
+    std::shared_ptr<ui::View> _content;
+};
+
+} // namespace platform::components

@@ -1,0 +1,57 @@
+#pragma once
+
+#include "platform/ui/TextFieldDelegate.h"
+#include "platform/ui/View.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+
+namespace platform::ui {
+class Button;
+class Label;
+class TextField;
+} // namespace platform::ui
+
+namespace platform::components {
+
+class PreviewView;
+
+/// The bar above a previewed document in which its text is searched: the field, how many matches there are,
+/// the one before and the one after. Main thread only.
+class PreviewSearchBar : public ui::View, private ui::TextFieldDelegate {
+public:
+    static constexpr double barHeight = 48; ///< points
+
+    static std::shared_ptr<PreviewSearchBar> create();
+    using ui::View::View;
+
+    void setOnClose(std::function<void()> callback) { _onClose = std::move(callback); }
+    /// Searches this view from now on; null: nothing.
+    void setPreview(const std::shared_ptr<PreviewView>& preview);
+    /// Shows the state of the search anew.
+    void update();
+
+    const std::shared_ptr<ui::TextField>& field() const { return _field; }
+    const std::shared_ptr<ui::Label>& countLabel() const { return _count; }
+    const std::shared_ptr<ui::Button>& previousButton() const { return _previous; }
+    const std::shared_ptr<ui::Button>& nextButton() const { return _next; }
+    const std::shared_ptr<ui::Button>& closeButton() const { return _close; }
+
+    void layoutSubviews() override;
+
+private:
+    void build();
+    void edited();
+    std::string countText() const;
+    bool textFieldShouldReturn(ui::TextField& field) override;
+
+    std::weak_ptr<PreviewView> _preview;
+    std::shared_ptr<ui::TextField> _field;
+    std::shared_ptr<ui::Label> _count;
+    std::shared_ptr<ui::Button> _previous, _next, _close;
+    std::function<void()> _onClose;
+    unsigned _edits = 0;
+};
+
+} // namespace platform::components

@@ -1,0 +1,64 @@
+#pragma once
+
+#include "platform/ui/View.h"
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace platform::ui {
+class ActivityIndicator;
+class Button;
+class ImageView;
+class Label;
+class StackView;
+} // namespace platform::ui
+
+namespace platform::components {
+
+/// What a preview shows in place of a document's content: its icon and name, what it is or what is the
+/// matter, how far a download has come, and what can be done. Main thread only.
+class PreviewSummaryView : public ui::View {
+public:
+    struct Action {
+        std::string title;
+        std::function<void()> run;
+        bool isSuggested = false;
+    };
+    struct Content {
+        std::string iconName{}; ///< of the icon theme; empty: none
+        std::string title{}; ///< empty: none
+        std::string message{}; ///< empty: none
+        bool isBusy = false; ///< with a spinner
+        std::optional<double> progress{}; ///< from 0 to 1, with a bar
+    };
+
+    static std::shared_ptr<PreviewSummaryView> create();
+    static constexpr double maximumWidth = 420; ///< points, of the text
+    static constexpr double iconSide = 96; ///< points
+    static constexpr double barWidth = 240, barHeight = 6; ///< points
+
+    using ui::View::View;
+
+    const Content& content() const { return _content; }
+    void setContent(const Content& content);
+    const std::vector<std::shared_ptr<ui::Button>>& buttons() const { return _buttons; }
+    /// The buttons below the text, the first one on top.
+    void setActions(const std::vector<Action>& actions);
+
+private:
+    void build();
+    void showProgress();
+
+    Content _content;
+    std::shared_ptr<ui::StackView> _stack;
+    std::shared_ptr<ui::ActivityIndicator> _spinner;
+    std::shared_ptr<ui::ImageView> _icon;
+    std::shared_ptr<ui::Label> _title, _message;
+    std::shared_ptr<ui::View> _bar, _filled;
+    std::vector<std::shared_ptr<ui::Button>> _buttons;
+};
+
+} // namespace platform::components

@@ -1,0 +1,53 @@
+#pragma once
+
+#include "platform/ui/View.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace platform::ui {
+class Button;
+class Label;
+} // namespace platform::ui
+
+namespace platform::components {
+
+class PreviewView;
+
+/// The bar below a previewed document: search, the page, smaller and larger, as far as the document has them.
+/// Main thread only.
+class PreviewToolbar : public ui::View {
+public:
+    static constexpr double barHeight = 48; ///< points; also a button's side
+
+    static std::shared_ptr<PreviewToolbar> create();
+    using ui::View::View;
+
+    void setOnFind(std::function<void()> callback) { _onFind = std::move(callback); }
+    /// Shows and acts on this view from now on; null: nothing.
+    void setPreview(const std::shared_ptr<PreviewView>& preview);
+    /// Shows the view's state anew.
+    void update();
+    bool isEmpty() const; ///< there is nothing to press
+
+    const std::shared_ptr<ui::Button>& findButton() const { return _find; }
+    const std::shared_ptr<ui::Button>& zoomOutButton() const { return _zoomOut; }
+    const std::shared_ptr<ui::Button>& zoomInButton() const { return _zoomIn; }
+    const std::shared_ptr<ui::Label>& pageLabel() const { return _page; }
+
+    void layoutSubviews() override;
+
+private:
+    void build();
+    void zoomBy(double factor);
+    std::string pageText() const;
+
+    std::weak_ptr<PreviewView> _preview;
+    std::shared_ptr<ui::Button> _find, _zoomOut, _zoomIn;
+    std::shared_ptr<ui::Label> _page;
+    std::function<void()> _onFind;
+};
+
+} // namespace platform::components
