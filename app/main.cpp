@@ -1,4 +1,5 @@
 #include "app/AppDelegate.h"
+#include "host/drive/LocalActivityHandOver.h"
 #include "host/drive/LocalCloudDocumentService.h"
 #include "host/gtk/DesktopSharing.h"
 #include "host/gtk/LaunchContext.h"
@@ -34,6 +35,7 @@
 namespace {
 
 using host::drive::DriveLayout;
+using host::drive::LocalActivityHandOver;
 using host::drive::LocalCloudDocumentService;
 using host::system::UserLocale;
 using platform::ServiceSet;
@@ -83,10 +85,12 @@ ServiceSet systemServices(const std::string& executable, const UserLocale& local
 /// Adds what stands on the drive's folder; answers where the drive lies.
 DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale)
 {
-    const auto cloud = LocalCloudDocumentService::create(DriveLayout::fromEnvironment(),
-        {set.dispatch, set.notificationCenter, set.typeRegistry, set.localization, set.linkOpener},
-        {.languages = locale.languageList()});
+    const host::drive::DriveDependencies dependencies{
+        set.dispatch, set.notificationCenter, set.typeRegistry, set.localization, set.linkOpener};
+    const auto cloud = LocalCloudDocumentService::create(
+        DriveLayout::fromEnvironment(), dependencies, {.languages = locale.languageList()});
     set.cloudDocumentService = cloud;
+    set.activityHandOver = LocalActivityHandOver::create(cloud->layout(), dependencies, cloud);
     set.fileSystem = std::make_shared<host::system::PosixFileSystem>(cloud->itemChanges());
     set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>(
         host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination(),

@@ -13,6 +13,9 @@ using platform::Url;
 using platform::components::PreviewController;
 using platform::components::PreviewControllerDataSource;
 using platform::components::PreviewControllerDelegate;
+using platform::ui::BarButtonItem;
+using platform::ui::SystemItem;
+using Button = std::shared_ptr<BarButtonItem>;
 
 std::shared_ptr<LookwellItemController> LookwellItemController::defaultController()
 {
@@ -26,10 +29,49 @@ std::shared_ptr<LookwellItemController> LookwellItemController::init()
     auto& self = *controller;
     self.setDataSource(std::shared_ptr<PreviewControllerDataSource>(controller, &self));
     self.setDelegate(std::shared_ptr<PreviewControllerDelegate>(controller, &self));
+    self.addButtons();
     return controller;
 }
 
 LookwellItemController::LookwellItemController() = default;
+
+void LookwellItemController::addButtons()
+{
+    const auto weak = std::weak_ptr(std::static_pointer_cast<LookwellItemController>(shared_from_this()));
+    const auto button = [&](SystemItem symbol, void (LookwellItemController::*action)(const Button&)) {
+        return std::make_shared<BarButtonItem>(symbol, [weak, action](const Button& sender) {
+            if (const auto screen = weak.lock())
+                ((*screen).*action)(sender);
+        });
+    };
+    setAdditionalRightBarButtonItems(
+        {button(SystemItem::Trash, &LookwellItemController::showWarningAndDeleteDocument),
+            button(SystemItem::Organize, &LookwellItemController::showMoveTarget)});
+}
+
+void LookwellItemController::viewWillDisappear(bool animated)
+{
+    if (const auto manager = itemManager())
+        manager->viewControllerWillDisappear(*this);
+    PreviewController::viewWillDisappear(animated);
+}
+
+void LookwellItemController::showMoveTarget(const Button&)
+{
+    static constexpr Operation op{"-[LookwellItemController showMoveTarget:]"};
+    op.userAction("Pressed Move (LW)");
+    op.info("Pressed Move");
+    if (const auto manager = itemManager())
+        manager->showMoveTarget(shared_from_this());
+}
+
+void LookwellItemController::showWarningAndDeleteDocument(const Button& sender)
+{
+    static constexpr Operation op{"-[LookwellItemController showWarningAndDeleteDocument:]"};
+    op.userAction("Pressed Delete (LW)");
+    if (const auto manager = itemManager())
+        manager->showWarningAndDeleteDocumentBarButton(shared_from_this(), sender);
+}
 
 void LookwellItemController::lookwellNewItem(const std::shared_ptr<PreviewItemManager>& manager)
 {

@@ -2,6 +2,7 @@
 
 #include "platform/Url.h"
 #include "platform/components/PreviewController.h"
+#include "platform/ui/Menu.h"
 
 #include <memory>
 #include <optional>
@@ -27,13 +28,25 @@ public:
     /// The one document of the manager's item; nothing when it had none.
     const std::optional<std::vector<platform::Url>>& arrayOfDocuments() const { return _arrayOfDocuments; }
 
+    /// What a peek of the preview offers to do: nothing.
+    const platform::ui::Menu& previewActionItems() const { return _previewActionItems; }
+    void setPreviewActionItems(platform::ui::Menu items) { _previewActionItems = std::move(items); }
+
     /// Makes a manager the current one and shows its item.
     void lookwellNewItem(const std::shared_ptr<PreviewItemManager>& manager);
 
     /// Whether a location's name says that it is a PDF document.
     bool _lwPreviewItemIsPDFKind(const platform::Url& item) const;
 
+    /// Tells the manager that the screen goes.
+    void viewWillDisappear(bool animated) override;
+
+    // What the buttons in the navigation bar do.
+    void showMoveTarget(const std::shared_ptr<platform::ui::BarButtonItem>& sender);
+    void showWarningAndDeleteDocument(const std::shared_ptr<platform::ui::BarButtonItem>& sender);
+
 private:
+    void addButtons();
     std::size_t numberOfPreviewItemsInPreviewController(
         const platform::components::PreviewController& controller) const override;
     platform::Url previewControllerPreviewItemAtIndex(
@@ -45,6 +58,7 @@ private:
 
     std::weak_ptr<PreviewItemManager> _itemManager;
     std::optional<std::vector<platform::Url>> _arrayOfDocuments;
+    platform::ui::Menu _previewActionItems;
 };
 
 } // namespace tarrow

@@ -1,12 +1,19 @@
+// Which screen shows an item, and the way of the stack to it. The presenter, the actions and the hand-over
+// have sources of their own.
+
 #include "preview/PreviewItemManager.h"
 
 #include "items/DRItem.h"
+#include "platform/Dispatch.h"
 #include "platform/FileSystem.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
+#include "platform/components/DocumentInteractionSheet.h"
 #include "platform/ui/SearchPresentation.h"
 #include "preview/LookwellItemController.h"
+#include "preview/PreviewDetailsViewController.h"
 
+#include <thread>
 #include <utility>
 
 namespace tarrow {
@@ -22,11 +29,6 @@ using platform::ui::ViewController;
 
 namespace {
 
-std::optional<Url> urlOf(const std::shared_ptr<DRItem>& item)
-{
-    return item ? std::optional(item->url()) : std::nullopt;
-}
-
 bool hasSomethingToShow(const std::shared_ptr<DRItem>& item)
 {
     return item && (item->isSymlink() || item->resolvedURL());
@@ -36,6 +38,26 @@ bool fileExists(const DRItem& item)
 {
     return item.resolvedURL() && services().fileSystem().typeOfItem(item.resolvedURL()->path()).has_value();
 }
+
+/// The coordinator holds its presenters while it calls them, so the last one to let go may be any thread;
+/// what a manager ends (observations, screens) belongs to the main thread.
+class EndOnMainThread {
+public:
+    EndOnMainThread()
+        : _main(services().dispatch().mainQueue())
+    {
+    }
+    void operator()(PreviewItemManager* manager) const
+    {
+        std::shared_ptr<PreviewItemManager> last(manager);
+        if (std::this_thread::get_id() != _mainThread)
+            _main->async([last = std::move(last)] {});
+    }
+
+private:
+    std::shared_ptr<platform::Queue> _main;
+    std::thread::id _mainThread = std::this_thread::get_id();
+};
 
 } // namespace
 
@@ -50,13 +72,18 @@ std::shared_ptr<PreviewItemManager> PreviewItemManager::newItemManagerWithModeNa
 
 std::shared_ptr<PreviewItemManager> PreviewItemManager::init()
 {
-    const auto manager = std::make_shared<PreviewItemManager>();
+    const std::shared_ptr<PreviewItemManager> manager(
+        std::make_unique<PreviewItemManager>().release(), EndOnMainThread());
     manager->observeApplication();
     LookwellItemController::defaultController();
     return manager;
 }
 
-PreviewItemManager::PreviewItemManager() = default;
+PreviewItemManager::PreviewItemManager()
+    : _fcQueue(services().dispatch().makeOperationQueue(
+        "TarrowDriveAppID.previewitem", platform::QualityOfService::UserInitiated))
+{
+}
 
 PreviewItemManager::~PreviewItemManager()
 {
@@ -68,43 +95,55 @@ void PreviewItemManager::setNavigationController(std::weak_ptr<NavigationControl
     _navigationController = std::move(navigationController);
 }
 
+void PreviewItemManager::setDocumentInteractionController(
+    std::shared_ptr<platform::components::DocumentInteractionSheet> sheet)
+{
+    _documentInteractionController = std::move(sheet);
+}
+
+std::shared_ptr<DRItem> PreviewItemManager::item() const
+{
+    const std::lock_guard lock(_mutex);
+    return _item;
+}
+
+std::optional<Url> PreviewItemManager::itemURL() const
+{
+    const auto shown = item();
+    return shown ? std::optional(shown->url()) : std::nullopt;
+}
+
+void PreviewItemManager::keepItem(const std::shared_ptr<DRItem>& item)
+{
+    const std::lock_guard lock(_mutex);
+    _item = item;
+}
+
 void PreviewItemManager::observeApplication()
 {
-    auto& notices = services().notificationCenter();
-    _observations.push_back(
-        notices.observe(Notification::ApplicationDidBecomeActive, [weak = weak_from_this()](const auto&) {
-            if (const auto self = weak.lock())
-                self->didBecomeActiveNotification();
-        }));
-    _observations.push_back(
-        notices.observe(Notification::ApplicationWillResignActive, [weak = weak_from_this()](const auto&) {
-            if (const auto self = weak.lock())
-                self->willResignActiveNotification();
-        }));
+    const auto observe = [this](Notification notification, void (PreviewItemManager::*handle)()) {
+        _observations.push_back(services().notificationCenter().observe(
+            notification, [weak = weak_from_this(), handle](const auto&) {
+                if (const auto self = weak.lock())
+                    ((*self).*handle)();
+            }));
+    };
+    observe(Notification::ApplicationDidBecomeActive, &PreviewItemManager::didBecomeActiveNotification);
+    observe(Notification::ApplicationWillResignActive, &PreviewItemManager::willResignActiveNotification);
 }
 
 void PreviewItemManager::didBecomeActiveNotification()
 {
     static constexpr Operation op{"-[PreviewItemManager didBecomeActiveNotification:]"};
-    op.debug("Becoming active for %@", urlOf(_item));
+    op.debug("Becoming active for %@", itemURL());
     registerAsFilePresenter();
 }
 
 void PreviewItemManager::willResignActiveNotification()
 {
     static constexpr Operation op{"-[PreviewItemManager willResignActiveNotification:]"};
-    op.debug("Resigning active for %@", urlOf(_item));
+    op.debug("Resigning active for %@", itemURL());
     unregisterAsFilePresenter();
-}
-
-void PreviewItemManager::registerAsFilePresenter()
-{
-    _filePresenterRegistered = true;
-}
-
-void PreviewItemManager::unregisterAsFilePresenter()
-{
-    _filePresenterRegistered = false;
 }
 
 void PreviewItemManager::previewItem(const std::shared_ptr<DRItem>& item)
@@ -120,21 +159,19 @@ void PreviewItemManager::setItem(const std::shared_ptr<DRItem>& item)
 void PreviewItemManager::setItemUpdatePreview(const std::shared_ptr<DRItem>& item, bool updatePreview)
 {
     static constexpr Operation op{"-[PreviewItemManager setItem:updatePreview:]"};
-    op.debug("Previewing %@", urlOf(item));
-    if (!item || !updatePreview) {
-        _item = item;
-        return;
-    }
+    op.debug("Previewing %@", item ? std::optional(item->url()) : std::nullopt);
+    if (!item || !updatePreview)
+        return keepItem(item);
     if (const auto screen = prepareToPreviewItem(item))
         replaceLastViewController(screen);
 }
 
-std::shared_ptr<ViewController> PreviewItemManager::prepareToPreviewItem(const std::shared_ptr<DRItem>& item)
+PreviewItemManager::Screen PreviewItemManager::prepareToPreviewItem(const std::shared_ptr<DRItem>& item)
 {
     static constexpr Operation op{"-[PreviewItemManager prepareToPreviewItem:]"};
-    if (!item || !_item || item->url() != _item->url())
+    if (!item || item->url() != itemURL())
         unregisterAsFilePresenter();
-    _item = item;
+    keepItem(item);
     if (!hasSomethingToShow(item)) {
         op.warning("no preview URL, nothing to show");
         return nullptr;
@@ -142,10 +179,21 @@ std::shared_ptr<ViewController> PreviewItemManager::prepareToPreviewItem(const s
     _modifiedDate = item->contentModificationDate();
     registerAsFilePresenter();
     const bool exists = fileExists(*item);
-    const auto screen = createLookwellController();
-    op.debug("Preview: Using %{public}@, %{public}@", "LookwellItemController",
+    _detailsViewController = nullptr;
+    const bool isQuick = _mode == PreviewModeQuick;
+    const auto screen = isQuick ? Screen(createLookwellController()) : Screen(createDetailsViewController());
+    op.debug("Preview: Using %{public}@, %{public}@",
+        isQuick ? "LookwellItemController" : "PreviewDetailsViewController",
         exists ? "File Exists" : "File doesn't exist");
     return screen;
+}
+
+std::shared_ptr<PreviewDetailsViewController> PreviewItemManager::createDetailsViewController()
+{
+    _detailsViewController = std::make_shared<PreviewDetailsViewController>();
+    _detailsViewController->setMode(_mode);
+    _detailsViewController->setItemManager(shared_from_this());
+    return _detailsViewController;
 }
 
 std::shared_ptr<LookwellItemController> PreviewItemManager::createLookwellController()
@@ -160,12 +208,19 @@ std::shared_ptr<LookwellItemController> PreviewItemManager::currentLookwellContr
     return LookwellItemController::defaultController();
 }
 
-bool PreviewItemManager::isPreviewControllerDisplayed(const std::shared_ptr<ViewController>& screen) const
+bool PreviewItemManager::isPreviewControllerDisplayed(const Screen& screen) const
 {
-    return std::dynamic_pointer_cast<LookwellItemController>(screen) != nullptr;
+    return std::dynamic_pointer_cast<PreviewBaseViewController>(screen)
+        || std::dynamic_pointer_cast<LookwellItemController>(screen);
 }
 
-void PreviewItemManager::replaceLastViewController(const std::shared_ptr<ViewController>& screen)
+void PreviewItemManager::viewControllerWillDisappear(const ViewController& screen)
+{
+    if (_detailsViewController.get() == &screen)
+        _detailsViewController = nullptr;
+}
+
+void PreviewItemManager::replaceLastViewController(const Screen& screen)
 {
     const auto navigation = navigationController();
     if (!navigation)
@@ -212,7 +267,7 @@ bool PreviewItemManager::warpToNewURL(const Url& url)
     const auto lists = dlcStackForURL(url);
     if (!lists)
         return false;
-    std::vector<std::shared_ptr<ViewController>> stack(lists->begin(), lists->end());
+    std::vector<Screen> stack(lists->begin(), lists->end());
     op.debug("New VC stack of DLCs: %@", *lists);
     unregisterAsFilePresenter();
     const auto item = DRItem::initWithURL(url);

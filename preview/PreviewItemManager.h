@@ -1,38 +1,55 @@
 #pragma once
 
 #include "platform/Date.h"
+#include "platform/FilePresenter.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Url.h"
 #include "platform/components/DocumentListController.h"
+#include "platform/components/MoveTargetPicker.h"
 #include "platform/ui/NavigationController.h"
 #include "platform/ui/ViewController.h"
 #include "preview/PreviewMode.h"
 
 #include <memory>
+#include <mutex>
 #include <optional>
+#include <string>
 #include <vector>
+
+namespace platform {
+struct UserActivity;
+} // namespace platform
+namespace platform::components {
+class DocumentInteractionSheet;
+}
 
 namespace tarrow {
 
 class DRItem;
 class LookwellItemController;
+class PreviewDetailsViewController;
 
-/// Coordinates the preview of one document: chooses its screen, puts it on the browser's stack and leads the
-/// stack to another place. Main thread only.
-///
-/// Both preview modes show the quick preview, as it is the only preview screen. Being registered as the
-/// item's presenter is a state that is kept here; nothing reports changes of the item yet.
-class PreviewItemManager : public std::enable_shared_from_this<PreviewItemManager> {
+/// Coordinates the preview of one document: chooses its screen and puts it on the browser's stack, follows
+/// what other programs do to the document, moves and deletes it, and offers it to the account's other devices
+/// while it is shown. Main thread, but for the presenter's calls; it ends on the main thread, whoever drops
+/// it.
+class PreviewItemManager : public platform::FilePresenter,
+                           public platform::components::MoveTargetPickerDelegate,
+                           public std::enable_shared_from_this<PreviewItemManager> {
 public:
+    using Screen = std::shared_ptr<platform::ui::ViewController>;
+    using ListStack = std::vector<std::shared_ptr<platform::components::DocumentListController>>;
+
     static std::shared_ptr<PreviewItemManager> newItemManagerWithModeNavController(
         int mode, const std::shared_ptr<platform::ui::NavigationController>& navigationController);
     /// Without a navigation controller the manager prepares screens but shows none.
     static std::shared_ptr<PreviewItemManager> init();
 
     PreviewItemManager();
-    ~PreviewItemManager();
+    ~PreviewItemManager() override;
 
-    const std::shared_ptr<DRItem>& item() const { return _item; }
+    /// Any thread.
+    std::shared_ptr<DRItem> item() const;
     int mode() const { return _mode; }
     void setMode(int mode) { _mode = mode; }
     std::shared_ptr<platform::ui::NavigationController> navigationController() const
@@ -40,6 +57,24 @@ public:
         return _navigationController.lock();
     }
     void setNavigationController(std::weak_ptr<platform::ui::NavigationController> navigationController);
+    /// The share sheet that was opened last; kept only so that it lives while it is shown.
+    const std::shared_ptr<platform::components::DocumentInteractionSheet>&
+    documentInteractionController() const
+    {
+        return _documentInteractionController;
+    }
+    void setDocumentInteractionController(
+        std::shared_ptr<platform::components::DocumentInteractionSheet> sheet);
+    /// Where the presenter's calls arrive.
+    const std::shared_ptr<platform::OperationQueue>& fcQueue() const { return _fcQueue; }
+    /// The content's date as it was seen last.
+    const std::optional<platform::Date>& modifiedDate() const { return _modifiedDate; }
+    bool refreshPending() const;
+    /// Null unless a details screen is shown or about to be.
+    const std::shared_ptr<PreviewDetailsViewController>& detailsViewController() const
+    {
+        return _detailsViewController;
+    }
 
     /// Shows an item. Null only forgets the current one.
     void previewItem(const std::shared_ptr<DRItem>& item);
@@ -48,38 +83,78 @@ public:
     void setItemUpdatePreview(const std::shared_ptr<DRItem>& item, bool updatePreview);
     /// Makes an item the current one and answers the screen that shows it; null when there is nothing to
     /// show.
-    std::shared_ptr<platform::ui::ViewController> prepareToPreviewItem(const std::shared_ptr<DRItem>& item);
-
+    Screen prepareToPreviewItem(const std::shared_ptr<DRItem>& item);
+    std::shared_ptr<PreviewDetailsViewController> createDetailsViewController();
     std::shared_ptr<LookwellItemController> createLookwellController();
     std::shared_ptr<LookwellItemController> currentLookwellController() const;
     /// Shows a screen in place of the preview on top of the stack, else on top of the stack; a search that
     /// lies over the stack is dismissed first.
-    void replaceLastViewController(const std::shared_ptr<platform::ui::ViewController>& screen);
-    bool isPreviewControllerDisplayed(const std::shared_ptr<platform::ui::ViewController>& screen) const;
+    void replaceLastViewController(const Screen& screen);
+    bool isPreviewControllerDisplayed(const Screen& screen) const;
+    /// A preview screen tells that it goes.
+    void viewControllerWillDisappear(const platform::ui::ViewController& screen);
 
-    using ListStack = std::vector<std::shared_ptr<platform::components::DocumentListController>>;
     /// The lists from the drive's top level to the folder of a URL; nothing when it leads to no folder of the
     /// drive.
     static std::optional<ListStack> dlcStackForURL(const platform::Url& url);
     /// Replaces the whole stack by the lists that lead to a URL and, for a document, its preview. False, and
     /// nothing changes, when there is no way to it.
     bool warpToNewURL(const platform::Url& url);
+    /// Reads the item anew from a URL and brings what is shown up to date.
+    void refreshItem(const platform::Url& url);
 
-    bool filePresenterRegistered() const { return _filePresenterRegistered; }
+    // Actions of the preview screens. Files are changed off the main thread.
+    void showWarningAndDeleteDocumentBarButton(
+        const Screen& screen, const std::shared_ptr<platform::ui::BarButtonItem>& button);
+    void showMoveTarget(const Screen& screen);
+    void documentTargetSelectionControllerDidSelectItemAtURL(
+        const std::shared_ptr<platform::components::MoveTargetPicker>& picker,
+        const platform::Url& folder) override;
+
+    // The presenter: what others do to the item, while registered. Any thread.
+    bool filePresenterRegistered() const;
     void registerAsFilePresenter();
     void unregisterAsFilePresenter();
+    std::optional<platform::Url> presentedItemURL() override;
+    std::shared_ptr<platform::OperationQueue> presentedItemOperationQueue() override { return _fcQueue; }
+    void presentedItemDidChange() override;
+    void presentedItemDidMoveToURL(const platform::Url& newURL) override;
+    void accommodatePresentedItemDeletionWithCompletionHandler(CompletionHandler completion) override;
+    void accommodatePresentedSubitemDeletionAtURLCompletionHandler(
+        const platform::Url& url, CompletionHandler completion) override;
+
+    // Hand-over to other devices. Registering on the main thread.
+    std::shared_ptr<const platform::UserActivity> batonneActivity() const;
+    void registerBatonneActivity();
+    void registerBatonneActivityForBookmark(const std::string& bookmark);
+    void unregisterBatonneActivity();
 
 private:
     void observeApplication();
     void didBecomeActiveNotification();
     void willResignActiveNotification();
+    std::optional<platform::Url> itemURL() const;
+    void keepItem(const std::shared_ptr<DRItem>& item);
+    void popPreview();
+    void refreshAfterSubitemDeletion();
+    void clearRefreshPending();
+    void refreshScreens(const DRItem& item, bool isElsewhere, bool isNewer, bool wasDownloaded);
+    void removeItem(const Screen& screen);
+    Screen screenForAlerts(const Screen& wanted) const;
 
-    std::shared_ptr<DRItem> _item;
     int _mode = PreviewModeQuick;
-    bool _filePresenterRegistered = false;
+    std::shared_ptr<platform::OperationQueue> _fcQueue;
     std::optional<platform::Date> _modifiedDate;
+    std::shared_ptr<PreviewDetailsViewController> _detailsViewController;
+    std::shared_ptr<platform::components::DocumentInteractionSheet> _documentInteractionController;
     std::weak_ptr<platform::ui::NavigationController> _navigationController;
     std::vector<platform::Observation> _observations;
+
+    mutable std::mutex _mutex; ///< of the fields below
+    std::shared_ptr<DRItem> _item;
+    std::shared_ptr<const platform::UserActivity> _batonneActivity;
+    bool _filePresenterRegistered = false;
+    bool _refreshPending = false;
 };
 
 } // namespace tarrow

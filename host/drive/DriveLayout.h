@@ -29,6 +29,8 @@ public:
     std::string keyValueStore() const { return _home + '/' + std::string(keyValueFileName); }
     std::string index() const { return _home + "/index.sqlite"; } ///< document identifiers
     std::string cloud() const { return _home + "/cloud"; } ///< contents of what is not downloaded
+    /// What the account's devices are doing, a file for each.
+    std::string activities() const { return _home + "/activities"; }
     /// Items that are being removed, each under a private name.
     std::string held() const { return _home + "/held"; }
     /// Where the processes that use the drive exclude each other; its content is never read.
@@ -36,6 +38,7 @@ public:
     /// What the application keeps between runs: defaults and saved interface state.
     const std::string& state() const { return _state; }
     std::string defaults() const { return _state + "/defaults.json"; }
+    std::string device() const { return _state + "/device"; } ///< what tells this device from others
     std::string interfaceState() const { return _state + "/interface.json"; }
 
     std::string container(std::string_view identifier) const;

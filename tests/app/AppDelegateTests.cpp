@@ -197,7 +197,7 @@ TEST_F(AppDelegateTest, URLsOpenItemsOfTheDrive)
     write("My Folder/100%.txt");
     launchApplication();
     EXPECT_TRUE(open(schemeURL("My%20Folder/100%2525.txt?mode=details")));
-    EXPECT_THAT(stack(), ElementsAre(top, "My Folder", "*"));
+    EXPECT_THAT(stack(), ElementsAre(top, "My Folder", "i"));
     EXPECT_EQ(browser->itemManager()->mode(), PreviewModeDetails);
     EXPECT_THAT(log->activities(), testing::Contains("AppDelegate: openURL"));
     EXPECT_TRUE(open(schemeURL("My%2520Folder")));

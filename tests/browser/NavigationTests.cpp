@@ -79,14 +79,15 @@ TEST_F(NavigationTest, ADocumentIsPreviewedInTheModeThatFits)
     struct Row {
         const char* name;
         int mode;
+        const char* screen;
     };
     launch();
-    for (const Row row : {Row{"note.txt", PreviewModeQuick}, {"archive.zip", PreviewModeDetails}}) {
+    for (const Row row : {Row{"note.txt", PreviewModeQuick, "*"}, {"archive.zip", PreviewModeDetails, "i"}}) {
         write(row.name);
         browser->documentListControllerDidSelectItemAtURL(topList(), url(row.name));
         EXPECT_EQ(browser->itemManager(), nullptr) << "the list ends its handling of the tap first";
         settle();
-        EXPECT_THAT(stack(), ElementsAre(top, "*"));
+        EXPECT_THAT(stack(), ElementsAre(top, row.screen));
         ASSERT_NE(browser->itemManager(), nullptr);
         EXPECT_EQ(browser->itemManager()->mode(), row.mode);
 
@@ -135,7 +136,7 @@ TEST_F(NavigationTest, LinksAreFollowedOneStepInsideTheDrive)
         {"outside", outside, unmoved, "DEBUG DLC Selection is symlink to outside target: "},
         {"dangling", "Folder/nothing", unmoved, "DLC Selection is symlink"},
         {"second-step-outside", "outside", unmoved, "DEBUG DLC Selection is symlink to"},
-        {"itself", "itself", {top, "*"}, ""},
+        {"itself", "itself", {top, "i"}, ""},
     };
     launch();
     for (const auto& row : rows) {

@@ -65,7 +65,7 @@ TEST_F(Manager, PutsOnePreviewOnTopAndShowsTheNextInItsPlace)
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(preview->content()->text, "content of First.txt");
 
-    const auto next = PreviewItemManager::newItemManagerWithModeNavController(PreviewModeDetails, navigation);
+    const auto next = PreviewItemManager::newItemManagerWithModeNavController(PreviewModeQuick, navigation);
     next->previewItem(document("Second.txt"));
     EXPECT_EQ(stack(), (Names{"-", "*"}));
     EXPECT_EQ(preview->itemManager(), next);

@@ -87,6 +87,8 @@ DriveFixture::DriveFixture()
     cloud = host::drive::LocalCloudDocumentService::create(
         layout, dependencies, {{"en"}, _folder.at("thumbnails")});
     set.cloudDocumentService = cloud;
+    handOver = host::drive::LocalActivityHandOver::create(cloud->layout(), dependencies, cloud);
+    set.activityHandOver = handOver;
     set.fileSystem = std::make_shared<host::system::PosixFileSystem>(cloud->itemChanges());
     set.storageOfferManager = cloud->storageOffers();
     set.keyValueStore = cloud->keyValueStore();

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/drive/LocalActivityHandOver.h"
 #include "host/drive/LocalCloudDocumentService.h"
 #include "host/drive/PromiseRecord.h"
 #include "platform/FileCoordinator.h"
@@ -62,6 +63,8 @@ private:
 public:
     /// The service under the installed set's cloudDocumentService.
     std::shared_ptr<host::drive::LocalCloudDocumentService> cloud;
+    /// The installed set's activityHandOver: this device.
+    std::shared_ptr<host::drive::LocalActivityHandOver> handOver;
     /// The installed set's fileCoordinator; what presenters are asked runs before the writer waits.
     std::shared_ptr<platform::FileCoordinator> fileCoordinator;
 };

@@ -11,6 +11,7 @@
 #include "platform/ui/AlertController.h"
 #include "platform/ui/Window.h"
 #include "preview/LookwellItemController.h"
+#include "preview/PreviewDetailsViewController.h"
 #include "tests/support/RecordingSharing.h"
 
 namespace testing_support {
@@ -40,6 +41,7 @@ BrowserFixture::BrowserFixture()
     cloud = std::make_shared<SimulatedCloud>(drive.cloud);
     const auto types = std::make_shared<host::system::MimeTypeRegistry>();
     platform::ServiceSet set;
+    set.activityHandOver = drive.handOver;
     set.appRegistry = apps;
     set.characterData = borrowed(_driveServices.characterData());
     set.cloudDocumentService = cloud;
@@ -95,6 +97,8 @@ std::vector<std::string> BrowserFixture::stack() const
         const auto list = std::dynamic_pointer_cast<DocumentListController>(screen);
         if (list)
             names.push_back(list->presentedURL() ? list->presentedURL()->lastPathComponent() : "");
+        else if (std::dynamic_pointer_cast<tarrow::PreviewDetailsViewController>(screen))
+            names.emplace_back("i");
         else
             names.emplace_back(std::dynamic_pointer_cast<tarrow::LookwellItemController>(screen) ? "*" : "-");
     }

@@ -50,7 +50,8 @@ protected:
     }
     static platform::UserDefaults& defaults() { return platform::services().userDefaults(); }
     List topList() const { return browser->getTopDocumentListController(); }
-    /// The last names of the folders that the stack shows, "*" for a preview and "-" for another screen.
+    /// The last names of the folders that the stack shows, "*" for a quick preview,
+    /// "i" for a details screen and "-" for another one.
     std::vector<std::string> stack() const;
     std::shared_ptr<platform::ui::AlertController> alert() const;
     /// The text of a number of items, as the catalogue has it.

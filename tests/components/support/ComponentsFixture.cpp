@@ -78,6 +78,7 @@ std::vector<std::string> RecordingListDelegate::take()
 ComponentsFixture::ComponentsFixture()
 {
     coordinator = std::make_shared<CountingCoordinator>(_driveServices.fileCoordinator());
+    _set.activityHandOver = drive.handOver;
     _set.appRegistry = apps;
     _set.cloudDocumentService = drive.cloud;
     _set.documentSharing = sharing;

@@ -1,0 +1,275 @@
+#include "preview/PreviewBaseViewController.h"
+
+#include "items/DRItem.h"
+#include "items/LaunchUtils.h"
+#include "items/UrlResolution.h"
+#include "platform/Log.h"
+#include "platform/components/DocumentInteractionSheet.h"
+#include "platform/ui/Button.h"
+#include "platform/ui/NavigationController.h"
+#include "platform/ui/NavigationItem.h"
+#include "platform/ui/Screen.h"
+#include "platform/ui/ScrollView.h"
+#include "platform/ui/VisualFormat.h"
+#include "platform/ui/Window.h"
+#include "preview/PreviewItemManager.h"
+#include "prompts/UIUtils.h"
+
+#include <algorithm>
+
+namespace tarrow {
+
+using platform::Operation;
+using platform::components::DocumentInteractionSheet;
+using platform::ui::BarButtonItem;
+using platform::ui::BarButtonItems;
+using platform::ui::InterfaceOrientation;
+using platform::ui::LayoutConstraint;
+using platform::ui::SizeClass;
+using platform::ui::SystemItem;
+using platform::ui::View;
+
+namespace {
+
+// The size of a phone's screen; the first layout pass replaces it.
+constexpr platform::Rect firstContentFrame{0, 0, 375, 667};
+/// Upright, the content ends this much above the bottom; points.
+constexpr double portraitBottomMargin = 17;
+
+bool isPortrait(int orientation)
+{
+    return orientation == static_cast<int>(InterfaceOrientation::Portrait)
+        || orientation == static_cast<int>(InterfaceOrientation::PortraitUpsideDown);
+}
+
+} // namespace
+
+std::shared_ptr<PreviewBaseViewController> PreviewBaseViewController::self()
+{
+    return std::static_pointer_cast<PreviewBaseViewController>(shared_from_this());
+}
+
+void PreviewBaseViewController::loadView()
+{
+    ViewController::loadView();
+    _contentView = std::make_shared<View>(firstContentFrame);
+    _contentView->setDebugName("ContentView");
+    _wrapperView = std::make_shared<View>();
+    _wrapperView->setPlacedByFrame(false);
+    _wrapperView->setDebugName("WrapperView");
+    _scrollView = std::make_shared<platform::ui::ScrollView>();
+    _scrollView->setPlacedByFrame(false);
+    _scrollView->setScrollBehavior({.showsHorizontalIndicator = false,
+        .showsVerticalIndicator = false,
+        .horizontalBounce = platform::ui::Bounce::Never,
+        .verticalBounce = platform::ui::Bounce::Always});
+    view()->addSubview(_scrollView);
+    _contentView->addSubview(_wrapperView);
+    _scrollView->addSubview(_contentView);
+}
+
+void PreviewBaseViewController::viewDidLoad()
+{
+    ViewController::viewDidLoad();
+    view()->setBackground(platform::Color::white());
+}
+
+void PreviewBaseViewController::viewWillAppear(bool animated)
+{
+    ViewController::viewWillAppear(animated);
+    configureButtons();
+    setupConstraints();
+    refreshItem();
+}
+
+void PreviewBaseViewController::viewWillDisappear(bool animated)
+{
+    if (const auto manager = itemManager())
+        manager->viewControllerWillDisappear(*this);
+    ViewController::viewWillDisappear(animated);
+}
+
+/// The constraints of one appearance hold for all later ones.
+void PreviewBaseViewController::setupConstraints()
+{
+    if (!navigationController() || _parentBottomConstraint)
+        return;
+    platform::ui::VisualFormatInput input;
+    input.views = {{"scrollView", _scrollView}, {"contentView", _contentView}};
+    for (const auto* format : {"H:|[scrollView]|", "V:|[scrollView]|"})
+        LayoutConstraint::activate(platform::ui::VisualFormat::constraints(format, input));
+    _parentLeadingConstraint = _wrapperView->leadingAnchor().equalTo(_contentView->leadingAnchor());
+    _parentTrailingConstraint = _wrapperView->trailingAnchor().equalTo(_contentView->trailingAnchor());
+    _parentTopConstraint = _wrapperView->topAnchor().equalTo(_contentView->topAnchor());
+    _parentBottomConstraint = _wrapperView->bottomAnchor().equalTo(_contentView->bottomAnchor());
+    LayoutConstraint::activate(
+        {_parentLeadingConstraint, _parentTrailingConstraint, _parentTopConstraint, _parentBottomConstraint});
+    configureMargins();
+}
+
+/// A window may become a tablet's or a phone's while it is shown.
+void PreviewBaseViewController::traitsDidChange(const platform::ui::TraitCollection& previous)
+{
+    ViewController::traitsDidChange(previous);
+    if (_barButtonActionItem && isVisible())
+        configureButtons();
+}
+
+void PreviewBaseViewController::viewWillLayoutSubviews()
+{
+    ViewController::viewWillLayoutSubviews();
+    const auto insets = scrollViewDefaultEdgeInsets();
+    auto frame = view()->bounds();
+    frame.height = std::max(0.0, frame.height - (insets.top + insets.bottom));
+    _contentView->setFrame(frame);
+    _scrollView->setContentSize({frame.width, frame.height});
+    configureMargins();
+}
+
+platform::EdgeInsets PreviewBaseViewController::scrollViewDefaultEdgeInsets() const
+{
+    platform::EdgeInsets insets;
+    // The shorter side is the status bar's thickness, however the device is held.
+    if (const auto& screen = platform::ui::Screen::main())
+        insets.top = std::min(screen->statusBarFrame.width, screen->statusBarFrame.height);
+    if (const auto navigation = navigationController()) {
+        insets.top += navigation->barFrames().navigationBar.height;
+        insets.bottom = navigation->isToolbarHidden() ? 0 : navigation->barFrames().toolbar.height;
+    }
+    return insets;
+}
+
+void PreviewBaseViewController::configureMargins()
+{
+    if (_parentBottomConstraint)
+        _parentBottomConstraint->setConstant(
+            isPortrait(currentPseudoOrientation()) ? -portraitBottomMargin : 0);
+}
+
+int PreviewBaseViewController::currentPseudoOrientation() const
+{
+    const auto& shown = traits();
+    if (shown.horizontalSizeClass == SizeClass::Compact && shown.verticalSizeClass == SizeClass::Regular)
+        return static_cast<int>(InterfaceOrientation::Portrait);
+    const auto inWindow = window();
+    return static_cast<int>(inWindow ? inWindow->interfaceOrientation() : InterfaceOrientation::Portrait);
+}
+
+bool PreviewBaseViewController::hasItemURL() const
+{
+    const auto manager = itemManager();
+    return manager && manager->item();
+}
+
+void PreviewBaseViewController::refreshItem()
+{
+    enableButtons();
+}
+
+void PreviewBaseViewController::enableButtons()
+{
+    const bool enabled = hasItemURL();
+    for (const auto& button : {_barButtonActionItem, _barButtonDeleteItem, _barButtonMoveItem}) {
+        if (button)
+            button->setEnabled(enabled);
+    }
+}
+
+PreviewBaseViewController::Button PreviewBaseViewController::makeButton(
+    SystemItem symbol, void (PreviewBaseViewController::*action)(const Button&))
+{
+    return std::make_shared<BarButtonItem>(
+        symbol, [weak = std::weak_ptr(self()), action](const Button& sender) {
+            if (const auto screen = weak.lock())
+                ((*screen).*action)(sender);
+        });
+}
+
+PreviewBaseViewController::Button PreviewBaseViewController::wrappedOpenInButton()
+{
+    const auto button = openInAppNavControllerButton();
+    if (!button)
+        return nullptr;
+    button->setAction([weak = std::weak_ptr(self())] {
+        if (const auto screen = weak.lock())
+            screen->openInDefaultApp();
+    });
+    button->sizeToFit();
+    return std::make_shared<BarButtonItem>(button);
+}
+
+void PreviewBaseViewController::configureButtons()
+{
+    const auto flexible = std::make_shared<BarButtonItem>(SystemItem::FlexibleSpace);
+    const auto otherFlexible = std::make_shared<BarButtonItem>(SystemItem::FlexibleSpace);
+    const auto fixed = std::make_shared<BarButtonItem>(SystemItem::FixedSpace);
+    const auto otherFixed = std::make_shared<BarButtonItem>(SystemItem::FixedSpace);
+    _barButtonMoveItem = makeButton(SystemItem::Organize, &PreviewBaseViewController::showMoveTarget);
+    _barButtonDeleteItem =
+        makeButton(SystemItem::Trash, &PreviewBaseViewController::showWarningAndDeleteDocument);
+    _barButtonActionItem = makeButton(SystemItem::Action, &PreviewBaseViewController::showDocumentActivities);
+    const auto openIn = wrappedOpenInButton();
+    enableButtons();
+    const auto navigation = navigationController();
+    const bool isTablet = UIUtils::tabulaMode();
+    if (navigation)
+        navigation->setToolbarHidden(isTablet);
+    if (isTablet) {
+        setToolbarItems({});
+        navigationItem().setRightItems(
+            {_barButtonActionItem, fixed, _barButtonDeleteItem, otherFixed, _barButtonMoveItem});
+        return;
+    }
+    setToolbarItems(
+        {_barButtonActionItem, flexible, _barButtonDeleteItem, otherFlexible, _barButtonMoveItem});
+    navigationItem().setRightItem(_mode == PreviewModeDetails ? openIn : nullptr);
+}
+
+void PreviewBaseViewController::openInDefaultApp()
+{
+    static constexpr Operation op{"-[PreviewBaseViewController openInDefaultApp:]"};
+    op.userAction("Pressed Open in <app>");
+    const auto manager = itemManager();
+    const auto item = manager ? manager->item() : nullptr;
+    if (item && !LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(item->url(), self(), true))
+        op.warning("Failed to open document %@ in default app", item->url());
+}
+
+void PreviewBaseViewController::showWarningAndDeleteDocument(const Button&)
+{
+    static constexpr Operation op{"-[PreviewBaseViewController showWarningAndDeleteDocument:]"};
+    op.userAction("Pressed Delete (preview base)");
+    if (const auto manager = itemManager())
+        manager->showWarningAndDeleteDocumentBarButton(self(), _barButtonDeleteItem);
+}
+
+void PreviewBaseViewController::showDocumentActivities(const Button&)
+{
+    static constexpr Operation op{"-[PreviewBaseViewController showDocumentActivities:]"};
+    op.userAction("Pressed Share (sheet) button (preview base)");
+    const auto manager = itemManager();
+    const auto item = manager ? manager->item() : nullptr;
+    if (!item)
+        return;
+    auto url = item->resolvedURL();
+    if (!url) {
+        op.warning("showDocumentActivities: url is wrong class: %{public}@", "(null)");
+        return;
+    }
+    op.info("showDocumentActivities: %@", *url);
+    if (auto resolved = trw_URLByResolvingBookmark(*url); resolved && *resolved != *url) {
+        op.info("URL resolved to %@", *resolved);
+        url = std::move(resolved);
+    }
+    const auto sheet = DocumentInteractionSheet::interactionControllerWithURL(*url);
+    manager->setDocumentInteractionController(sheet);
+    sheet->presentOptionsMenuFromBarButtonItem(self(), _barButtonActionItem, true);
+}
+
+void PreviewBaseViewController::showMoveTarget(const Button&)
+{
+    if (const auto manager = itemManager())
+        manager->showMoveTarget(self());
+}
+
+} // namespace tarrow

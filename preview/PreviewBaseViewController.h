@@ -1,0 +1,92 @@
+#pragma once
+
+#include "platform/Geometry.h"
+#include "platform/ui/BarButtonItem.h"
+#include "platform/ui/LayoutConstraint.h"
+#include "platform/ui/ViewController.h"
+#include "preview/PreviewMode.h"
+
+#include <memory>
+
+namespace platform::ui {
+class Button;
+class ScrollView;
+} // namespace platform::ui
+
+namespace tarrow {
+
+class PreviewItemManager;
+
+/// What the program's own preview screens have in common: content that scrolls between the bars, and the
+/// buttons to share, delete and move the item of the manager that made the screen. Main thread only.
+class PreviewBaseViewController : public platform::ui::ViewController {
+public:
+    using Button = std::shared_ptr<platform::ui::BarButtonItem>;
+
+    std::shared_ptr<PreviewItemManager> itemManager() const { return _itemManager.lock(); }
+    void setItemManager(std::weak_ptr<PreviewItemManager> manager) { _itemManager = std::move(manager); }
+    int mode() const { return _mode; } ///< the manager's
+    void setMode(int mode) { _mode = mode; }
+
+    // Null before the view is loaded.
+    const std::shared_ptr<platform::ui::ScrollView>& scrollView() const { return _scrollView; }
+    const std::shared_ptr<platform::ui::View>& contentView() const { return _contentView; }
+    /// Where subclasses put their content.
+    const std::shared_ptr<platform::ui::View>& wrapperView() const { return _wrapperView; }
+
+    // The wrapper's edges against those of the content view; null before the first appearance.
+    const auto& parentLeadingConstraint() const { return _parentLeadingConstraint; }
+    const auto& parentTrailingConstraint() const { return _parentTrailingConstraint; }
+    const auto& parentTopConstraint() const { return _parentTopConstraint; }
+    const auto& parentBottomConstraint() const { return _parentBottomConstraint; }
+
+    // Made anew at each appearance; null before the first.
+    const Button& barButtonActionItem() const { return _barButtonActionItem; } ///< Share
+    const Button& barButtonDeleteItem() const { return _barButtonDeleteItem; }
+    const Button& barButtonMoveItem() const { return _barButtonMoveItem; }
+
+    void loadView() override;
+    void viewDidLoad() override;
+    void viewWillAppear(bool animated) override;
+    void viewWillDisappear(bool animated) override;
+    void viewWillLayoutSubviews() override;
+    void traitsDidChange(const platform::ui::TraitCollection& previous) override;
+
+    void setupConstraints();
+    /// How much of the screen lies under the bars; points.
+    platform::EdgeInsets scrollViewDefaultEdgeInsets() const;
+    void configureMargins();
+    /// An InterfaceOrientation's number; a narrow, high screen is always upright (1).
+    int currentPseudoOrientation() const;
+    void configureButtons();
+    /// The button that opens the item in another app, for the navigation bar of a phone; null: none.
+    virtual std::shared_ptr<platform::ui::Button> openInAppNavControllerButton() { return nullptr; }
+    /// The item may have changed. Overriders call this first.
+    virtual void refreshItem();
+
+    // What the buttons do.
+    void openInDefaultApp();
+    void showWarningAndDeleteDocument(const Button& sender);
+    void showDocumentActivities(const Button& sender);
+    void showMoveTarget(const Button& sender);
+
+private:
+    using Constraint = std::shared_ptr<platform::ui::LayoutConstraint>;
+
+    std::shared_ptr<PreviewBaseViewController> self();
+    Button makeButton(
+        platform::ui::SystemItem symbol, void (PreviewBaseViewController::*action)(const Button&));
+    Button wrappedOpenInButton();
+    void enableButtons();
+    bool hasItemURL() const;
+
+    std::weak_ptr<PreviewItemManager> _itemManager;
+    int _mode = PreviewModeDetails;
+    std::shared_ptr<platform::ui::ScrollView> _scrollView;
+    std::shared_ptr<platform::ui::View> _contentView, _wrapperView;
+    Constraint _parentLeadingConstraint, _parentTrailingConstraint, _parentTopConstraint,
+        _parentBottomConstraint;
+    Button _barButtonActionItem, _barButtonDeleteItem, _barButtonMoveItem;
+};
+
+} // namespace tarrow

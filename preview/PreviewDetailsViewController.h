@@ -1,0 +1,26 @@
+#pragma once
+
+#include "preview/PreviewBaseViewController.h"
+
+#include <memory>
+
+namespace platform::components {
+class PlaceholderView;
+}
+
+namespace tarrow {
+
+/// Describes one item: its icon, name, kind and size. Main thread only.
+class PreviewDetailsViewController : public PreviewBaseViewController {
+public:
+    void viewDidLoad() override;
+    void refreshItem() override;
+
+    /// Null before the view is loaded.
+    const std::shared_ptr<platform::components::PlaceholderView>& summaryView() const { return _summaryView; }
+
+private:
+    std::shared_ptr<platform::components::PlaceholderView> _summaryView;
+};
+
+} // namespace tarrow

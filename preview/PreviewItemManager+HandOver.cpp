@@ -1,0 +1,96 @@
+// The previewed document as something that the account's other devices can go on with.
+
+#include "items/DRItem.h"
+#include "items/Settings.h"
+#include "items/UrlResolution.h"
+#include "platform/ActivityHandOver.h"
+#include "platform/CloudDocumentService.h"
+#include "platform/Dispatch.h"
+#include "platform/Log.h"
+#include "platform/Services.h"
+#include "preview/PreviewItemManager.h"
+
+namespace tarrow {
+
+using platform::Operation;
+using platform::Result;
+using platform::services;
+using platform::UserActivity;
+
+namespace {
+
+constexpr Operation op{"-[PreviewItemManager registerBatonneActivity]"};
+
+void logFailure(const Error& error)
+{
+    // What cannot be named for other devices is an ordinary thing.
+    const bool isExpected =
+        error.domain() == platform::errorDomain::cloud && error.code() == platform::notBookmarkableCode;
+    if (isExpected)
+        op.info("RZBookmarkableStringFromDocumentURL returned %{public}@", error);
+    else
+        op.error("RZBookmarkableStringFromDocumentURL returned %{public}@", error);
+}
+
+} // namespace
+
+std::shared_ptr<const UserActivity> PreviewItemManager::batonneActivity() const
+{
+    const std::lock_guard lock(_mutex);
+    return _batonneActivity;
+}
+
+void PreviewItemManager::registerBatonneActivity()
+{
+    const auto url = itemURL();
+    if (!url)
+        return;
+    services().cloudDocumentService().items().RZBookmarkableStringFromDocumentURL(
+        trw_URLByResolvingAlias(*url),
+        [weak = weak_from_this(), main = services().dispatch().mainQueue()](
+            const Result<std::string>& answer) {
+            if (answer.error)
+                return logFailure(*answer.error);
+            if (!answer.value) {
+                op.error("RZBookmarkableStringFromDocumentURL returned empty bookmark");
+                return;
+            }
+            main->async([weak, bookmark = *answer.value] {
+                // The bookmark may have been long in the making, and the item be no longer watched.
+                if (const auto self = weak.lock(); self && self->filePresenterRegistered())
+                    self->registerBatonneActivityForBookmark(bookmark);
+            });
+        });
+}
+
+void PreviewItemManager::registerBatonneActivityForBookmark(const std::string& bookmark)
+{
+    if (bookmark.empty())
+        return;
+    auto activity = std::make_shared<UserActivity>();
+    activity->type = Settings::batonneTarrowActivityType();
+    activity->isEligibleForHandOff = true;
+    activity->userInfo.emplace(platform::activityKey::documentURL, bookmark);
+    {
+        const std::lock_guard lock(_mutex);
+        _batonneActivity = activity;
+    }
+    auto& handOver = services().activityHandOver();
+    handOver.becomeCurrent(activity);
+    // A deletion unregisters on another thread and may have come in between.
+    if (batonneActivity() != activity)
+        handOver.resignCurrent(activity);
+}
+
+void PreviewItemManager::unregisterBatonneActivity()
+{
+    std::shared_ptr<const UserActivity> activity;
+    {
+        const std::lock_guard lock(_mutex);
+        activity.swap(_batonneActivity);
+    }
+    if (activity)
+        services().activityHandOver().resignCurrent(activity);
+}
+
+} // namespace tarrow

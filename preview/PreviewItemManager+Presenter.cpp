@@ -1,0 +1,199 @@
+// What others do to the previewed item, and how the preview follows.
+
+#include "items/DRItem.h"
+#include "platform/CloudDocumentService.h"
+#include "platform/Dispatch.h"
+#include "platform/FileCoordinator.h"
+#include "platform/Log.h"
+#include "platform/Services.h"
+#include "preview/LookwellItemController.h"
+#include "preview/PreviewDetailsViewController.h"
+#include "preview/PreviewItemManager.h"
+
+namespace tarrow {
+
+using platform::Operation;
+using platform::services;
+using platform::Url;
+
+namespace {
+
+/// Programs save in several steps; one reading after the last of them is enough.
+constexpr auto refreshDelay = std::chrono::seconds(1);
+
+void reloadPreview()
+{
+    static constexpr Operation op{"-[PreviewItemManager refreshItem:]"};
+    op.debug("LWPreviewController: refreshCurrentPreviewItem");
+    LookwellItemController::defaultController()->refreshCurrentPreviewItem();
+}
+
+} // namespace
+
+bool PreviewItemManager::filePresenterRegistered() const
+{
+    const std::lock_guard lock(_mutex);
+    return _filePresenterRegistered;
+}
+
+void PreviewItemManager::registerAsFilePresenter()
+{
+    {
+        const std::lock_guard lock(_mutex);
+        if (!_filePresenterRegistered)
+            services().fileCoordinator().addFilePresenter(shared_from_this());
+        _filePresenterRegistered = true;
+    }
+    registerBatonneActivity();
+}
+
+void PreviewItemManager::unregisterAsFilePresenter()
+{
+    {
+        const std::lock_guard lock(_mutex);
+        if (_filePresenterRegistered)
+            services().fileCoordinator().removeFilePresenter(*this);
+        _filePresenterRegistered = false;
+    }
+    unregisterBatonneActivity();
+}
+
+std::optional<Url> PreviewItemManager::presentedItemURL()
+{
+    static constexpr Operation op{"-[PreviewItemManager presentedItemURL]"};
+    auto url = itemURL();
+    op.debug("presentedItemURL %@", url);
+    return url;
+}
+
+bool PreviewItemManager::refreshPending() const
+{
+    const std::lock_guard lock(_mutex);
+    return _refreshPending;
+}
+
+void PreviewItemManager::clearRefreshPending()
+{
+    const std::lock_guard lock(_mutex);
+    _refreshPending = false;
+}
+
+void PreviewItemManager::presentedItemDidChange()
+{
+    static constexpr Operation op{"-[PreviewItemManager presentedItemDidChange]"};
+    op.info("presentedItemDidChange: %@", itemURL());
+    {
+        const std::lock_guard lock(_mutex);
+        if (std::exchange(_refreshPending, true))
+            return;
+    }
+    auto& dispatch = services().dispatch();
+    dispatch.after(refreshDelay, dispatch.mainQueue(), [weak = weak_from_this()] {
+        const auto self = weak.lock();
+        if (!self)
+            return;
+        if (const auto url = self->itemURL())
+            self->refreshItem(*url);
+        self->clearRefreshPending();
+    });
+}
+
+void PreviewItemManager::refreshItem(const Url& url)
+{
+    static constexpr Operation op{"-[PreviewItemManager refreshItem:]"};
+    const auto fresh = DRItem::initWithURL(url);
+    if (!fresh)
+        return;
+    const auto old = item();
+    const auto oldPath = old ? std::optional(old->url().path()) : std::nullopt;
+    const bool isElsewhere = oldPath != fresh->url().path();
+    if (isElsewhere)
+        op.error("UNEXPECTED: path changed but we only got a presentedItemDidChange: %@ to %@", oldPath,
+            fresh->url().path());
+    const bool wasDownloaded = old && old->isDownloaded();
+    const auto& date = fresh->contentModificationDate();
+    op.debug("%@: modDate %{public}@ vs %{public}@", fresh->url(), _modifiedDate, date);
+    const bool isNewer = _modifiedDate && date && *_modifiedDate < *date;
+    _modifiedDate = date;
+    setItemUpdatePreview(fresh, isElsewhere);
+    op.info("Refreshing %@", itemURL());
+    refreshScreens(*fresh, isElsewhere, isNewer, wasDownloaded);
+}
+
+void PreviewItemManager::refreshScreens(
+    const DRItem& item, bool isElsewhere, bool isNewer, bool wasDownloaded)
+{
+    const auto preview = LookwellItemController::defaultController();
+    preview->setTitle(item.localizedName());
+    if (preview->isVisible() && isNewer)
+        reloadPreview();
+    if (_detailsViewController && (isElsewhere || isNewer || (!wasDownloaded && item.isDownloaded())))
+        _detailsViewController->refreshItem();
+}
+
+void PreviewItemManager::presentedItemDidMoveToURL(const Url& newURL)
+{
+    static constexpr Operation op{"-[PreviewItemManager presentedItemDidMoveToURL:]"};
+    const auto& items = services().cloudDocumentService().items();
+    const auto real = items.realURL(newURL);
+    const auto url = itemURL();
+    op.info("presentedItemDidMoveToURL: %@ changed to %@", url, real);
+    if (items.isInTrash(real) || !items.isInDocumentsArea(real))
+        return accommodatePresentedItemDeletionWithCompletionHandler([](const auto&) {});
+    if (url && url->path() == real.path()) {
+        op.warning("UNEXPECTED: duplicate calls to presentedItemDidMoveToURL: %@", real.path());
+        return;
+    }
+    services().dispatch().mainQueue()->async([weak = weak_from_this(), real] {
+        if (const auto self = weak.lock())
+            self->warpToNewURL(real);
+    });
+}
+
+void PreviewItemManager::accommodatePresentedItemDeletionWithCompletionHandler(CompletionHandler completion)
+{
+    static constexpr Operation op{
+        "-[PreviewItemManager accommodatePresentedItemDeletionWithCompletionHandler:]"};
+    op.info("Accommodate deletion: %@", itemURL());
+    completion(std::nullopt);
+    unregisterAsFilePresenter();
+    services().dispatch().mainQueue()->async([weak = weak_from_this()] {
+        if (const auto self = weak.lock())
+            self->popPreview();
+    });
+}
+
+/// A preview that was only prepared, or left meanwhile, has no screen that could go.
+void PreviewItemManager::popPreview()
+{
+    const auto navigation = navigationController();
+    if (navigation && isPreviewControllerDisplayed(navigation->topViewController()))
+        navigation->popViewController(true);
+}
+
+void PreviewItemManager::accommodatePresentedSubitemDeletionAtURLCompletionHandler(
+    const Url& url, CompletionHandler completion)
+{
+    static constexpr Operation op{
+        "-[PreviewItemManager accommodatePresentedSubitemDeletionAtURL:completionHandler:]"};
+    op.info("%@ accommodate subitem deletion at %@", itemURL(), url);
+    completion(std::nullopt);
+    unregisterAsFilePresenter();
+    auto& dispatch = services().dispatch();
+    dispatch.after(refreshDelay, dispatch.mainQueue(), [weak = weak_from_this()] {
+        if (const auto self = weak.lock())
+            self->refreshAfterSubitemDeletion();
+    });
+}
+
+void PreviewItemManager::refreshAfterSubitemDeletion()
+{
+    static constexpr Operation op{
+        "-[PreviewItemManager accommodatePresentedSubitemDeletionAtURL:completionHandler:]"};
+    op.info("Refreshing %@", itemURL());
+    if (LookwellItemController::defaultController()->isVisible())
+        reloadPreview();
+    clearRefreshPending();
+}
+
+} // namespace tarrow
