@@ -140,8 +140,6 @@ void DocumentListController::contentsDidChange(const FolderContentsUpdate& updat
     _rows->visibleRowsDidChange();
     if (update.stage != ListingStage::FirstRows)
         _listView->endRefreshing();
-    if (_search)
-        _search->setSnapshot(update.rows->snapshot());
     showStateOfFolder();
     if (const auto told = delegate())
         told->documentListControllerItemsChanged(keepsAlive);
@@ -192,12 +190,19 @@ void DocumentListController::startSearchWithQueryStringBecomeFirstResponder(
     const std::string& query, bool becomeFirstResponder)
 {
     view();
-    _search = DocumentSearch::create([weak = std::weak_ptr(self())](const Url& url, FolderEntryKind kind) {
-        if (const auto list = weak.lock())
-            list->open(url, kind);
+    const auto weak = std::weak_ptr(self());
+    _search = DocumentSearch::create({
+        .chosen =
+            [weak](const Url& url, FolderEntryKind kind) {
+                if (const auto list = weak.lock())
+                    list->open(url, kind);
+            },
+        .showInFolder =
+            [weak](const Url& url) {
+                if (const auto list = weak.lock())
+                    list->open(url.deletingLastPathComponent(), FolderEntryKind::Folder);
+            },
     });
-    if (_contents)
-        _search->setSnapshot(_contents->rows()->snapshot());
     const auto presentation = _search->presentation();
     presentation->setQuery(query);
     presentViewController(presentation, true, [presentation, becomeFirstResponder] {

@@ -82,6 +82,8 @@ ui::ListRow DocumentRowSource::rowAtIndex(const ui::ListView&, std::size_t index
     const bool isKnown = known != _known.end();
     if (isKnown)
         complete(row, known->second.details);
+    if (_places)
+        row.detail = _places(_rows->url(index)) + (row.detail.empty() ? "" : " · " + row.detail);
     row.accessibleDescription =
         spokenDescription(row, isKnown ? known->second.details.tagNames : std::vector<std::string>());
     return row;

@@ -36,6 +36,10 @@ public:
     void setRows(std::shared_ptr<const DocumentRows> rows) { _rows = std::move(rows); }
     void setTagColors(TagColors tagColors) { _tagColors = std::move(tagColors); }
 
+    /// Where an item lies, said before its details; none at first. Called for rows that are about to be seen.
+    using Places = std::function<std::string(const Url& url)>;
+    void setPlaces(Places places) { _places = std::move(places); }
+
     /// Fetches what is missing for the visible rows.
     void visibleRowsDidChange();
     /// The items may have changed: known details stay on the screen until the next `visibleRowsDidChange` has
@@ -64,6 +68,7 @@ private:
     std::shared_ptr<const DocumentRows> _rows;
     std::shared_ptr<RowDetailsLoader> _loader;
     TagColors _tagColors;
+    Places _places;
     std::unordered_map<ui::RowId, Known> _known;
     mutable std::unordered_map<std::string, std::string> _iconsByExtension;
 };

@@ -3,6 +3,7 @@
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/components/DocumentRowSource.h"
+#include "platform/components/FolderPlaces.h"
 #include "platform/components/PlaceholderView.h"
 #include "platform/ui/ListView.h"
 
@@ -10,16 +11,27 @@
 
 namespace platform::components {
 
-std::shared_ptr<DocumentSearch> DocumentSearch::create(Chosen chosen)
+namespace {
+
+std::shared_ptr<const DocumentRows> rowsOf(const NameSearchResults& results)
 {
-    const auto search = std::make_shared<DocumentSearch>(std::move(chosen));
+    FolderSnapshot::Builder builder(rootFolder().value_or(Url::fileURL("/")));
+    for (const auto& item : results.items)
+        builder.append(FolderSnapshot::ExtraItem{item.url, item.url.lastPathComponent(), item.kind, {}});
+    return DocumentRows::make(builder.finish(ListingStage::Complete));
+}
+
+} // namespace
+
+std::shared_ptr<DocumentSearch> DocumentSearch::create(Handlers handlers)
+{
+    const auto search = std::make_shared<DocumentSearch>(std::move(handlers));
     search->build();
     return search;
 }
 
-DocumentSearch::DocumentSearch(Chosen chosen)
-    : _chosen(std::move(chosen))
-    , _queue(services().dispatch().makeOperationQueue("document search", QualityOfService::UserInteractive))
+DocumentSearch::DocumentSearch(Handlers handlers)
+    : _handlers(std::move(handlers))
 {
 }
 
@@ -28,6 +40,7 @@ void DocumentSearch::build()
     _results = std::make_shared<ui::ListView>();
     _results->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
     _source = DocumentRowSource::create(_results);
+    _source->setPlaces(placeText);
     _results->setDataSource(_source);
     _results->setListDelegate(
         std::shared_ptr<ui::ListViewDelegate>(shared_from_this(), static_cast<ui::ListViewDelegate*>(this)));
@@ -43,56 +56,75 @@ void DocumentSearch::build()
     }
     _presentation->setDelegate(std::shared_ptr<ui::SearchPresentationDelegate>(
         shared_from_this(), static_cast<ui::SearchPresentationDelegate*>(this)));
+    // It learns the names before the first letter is typed.
+    begin();
 }
 
-void DocumentSearch::setSnapshot(std::shared_ptr<const FolderSnapshot> snapshot)
+void DocumentSearch::begin()
 {
-    _snapshot = std::move(snapshot);
-    findMatches();
+    _session = services().nameSearch().begin(
+        searchableFolders(), [weak = weak_from_this()](const NameSearchResults& results) {
+            if (const auto self = weak.lock())
+                self->resultsArrived(results);
+        });
 }
 
 void DocumentSearch::searchQueryDidChange(ui::SearchPresentation&)
 {
-    findMatches();
+    if (!_session)
+        begin();
+    _session->setQuery(_presentation->query());
 }
 
-void DocumentSearch::findMatches()
+void DocumentSearch::searchDidDisappear(ui::SearchPresentation&)
 {
-    if (!_snapshot)
-        return;
-    const auto main = services().dispatch().mainQueue();
-    _queue->addOperation([weak = weak_from_this(), snapshot = _snapshot, query = _presentation->query(), main,
-                             generation = ++_generation] {
-        // An empty field shows no results rather than the whole folder again.
-        auto rows = query.empty()
-            ? DocumentRows::make(FolderSnapshot::Builder(snapshot->folder()).finish(ListingStage::Complete))
-            : DocumentRows::matching(snapshot, query);
-        main->async([weak, rows, generation] {
-            if (const auto self = weak.lock(); self && self->_generation == generation)
-                self->show(rows);
-        });
-    });
+    _session.reset();
 }
 
-void DocumentSearch::show(std::shared_ptr<const DocumentRows> rows)
+void DocumentSearch::resultsArrived(const NameSearchResults& results)
 {
-    const bool isFruitless = rows->count() == 0 && !_presentation->query().empty();
+    const auto before = _source->rows();
+    auto rows = rowsOf(results);
+    const bool isSameQuery = before && results.query == _shownQuery;
+    _shownQuery = results.query;
+    const auto changes = isSameQuery ? DocumentRows::changes(*before, *rows) : ui::ListChanges();
     _source->setRows(std::move(rows));
-    _results->reloadAll();
+    if (isSameQuery)
+        _results->apply(changes);
+    else
+        _results->reloadAll();
     _source->visibleRowsDidChange();
-    _placeholder->setContent({
-        .iconName = "edit-find-symbolic",
-        .title = localized("Nothing found"),
-        .message = localized("No item here has a name with this text."),
-    });
-    _placeholder->setHidden(!isFruitless);
+    showState(results);
+}
+
+void DocumentSearch::showState(const NameSearchResults& results)
+{
+    if (results.isComplete)
+        _placeholder->setContent({.iconName = "edit-find-symbolic",
+            .title = localized("Nothing found"),
+            .message = localized("No item of the drive has a name with this text.")});
+    else
+        _placeholder->setContent({.message = localized("Searching…"), .isBusy = true});
+    _placeholder->setHidden(results.total > 0 || results.query.empty());
 }
 
 void DocumentSearch::rowActivated(ui::ListView&, std::size_t index)
 {
     const auto& rows = _source->rows();
     if (rows && index < rows->count())
-        _chosen(rows->url(index), rows->entry(index).kind);
+        _handlers.chosen(rows->url(index), rows->entry(index).kind);
+}
+
+ui::Menu DocumentSearch::menuForRow(ui::ListView&, std::size_t index)
+{
+    const auto& rows = _source->rows();
+    if (!rows || index >= rows->count())
+        return {};
+    auto show = [weak = weak_from_this(), url = rows->url(index)] {
+        if (const auto self = weak.lock())
+            self->_handlers.showInFolder(url);
+    };
+    return {{.title = localized("Show in Its Folder"), .handler = std::move(show), .image = {}}};
 }
 
 void DocumentSearch::visibleRowsDidChange(ui::ListView&, ui::RowRange)

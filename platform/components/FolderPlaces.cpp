@@ -75,4 +75,23 @@ std::vector<Url> foldersDownTo(const Url& folder)
     return folders;
 }
 
+std::string placeText(const Url& item)
+{
+    const auto way = foldersDownTo(item.deletingLastPathComponent());
+    std::string text;
+    for (std::size_t i = way.size() > 1 ? 1 : 0; i < way.size(); ++i)
+        text += (text.empty() ? "" : " › ") + folderTitle(way[i]);
+    return text;
+}
+
+std::vector<Url> searchableFolders()
+{
+    std::vector<Url> folders;
+    for (const auto& container : containers().allContainers()) {
+        if (container->documentsURL)
+            folders.push_back(*container->documentsURL);
+    }
+    return folders;
+}
+
 } // namespace platform::components

@@ -15,6 +15,13 @@ std::optional<Url> rootFolder();
 /// What a folder's list is called: a container's documents folder after its container.
 std::string folderTitle(const Url& folder);
 
+/// Where an item lies, in words: the titles of the folders that lead to it, the drive's top level left out
+/// but for items that lie right there.
+std::string placeText(const Url& item);
+
+/// The folders that a search looks through: the documents folders of all containers.
+std::vector<Url> searchableFolders();
+
 /// What a folder's list shows beside the folder's own items: at the drive's top level the app libraries.
 std::vector<FolderSnapshot::ExtraItem> extraItemsOf(const Url& folder);
 

@@ -47,4 +47,11 @@ void SearchPresentation::userCancelled()
         delegate->searchWasCancelled(*self);
 }
 
+void SearchPresentation::viewDidDisappear(bool animated)
+{
+    ViewController::viewDidDisappear(animated);
+    if (const auto told = _delegate.lock())
+        told->searchDidDisappear(*this);
+}
+
 } // namespace platform::ui

@@ -14,6 +14,8 @@ public:
     virtual void searchQueryDidChange(SearchPresentation& search) = 0;
     /// The user left the search; it is dismissed already.
     virtual void searchWasCancelled(SearchPresentation&) { }
+    /// The search is not shown any more, for whatever reason.
+    virtual void searchDidDisappear(SearchPresentation&) { }
 };
 
 /// Calls down that only a search makes.
@@ -47,6 +49,8 @@ public:
     // Events up.
     void userEditedQuery(std::string query);
     void userCancelled() override;
+
+    void viewDidDisappear(bool animated) override;
 
 private:
     std::weak_ptr<SearchPresentationDelegate> _delegate;

@@ -3,6 +3,7 @@
 #include "host/drive/ContainerRecord.h"
 #include "host/drive/ItemFacts.h"
 #include "platform/Localization.h"
+#include "platform/components/FolderPlaces.h"
 #include "platform/components/PlaceholderView.h"
 #include "platform/components/UnavailableScreen.h"
 #include "platform/ui/AlertController.h"
@@ -417,24 +418,37 @@ TEST_F(DocumentList, KnowsTheWayFromTheTopOfTheDrive)
     }
 }
 
-TEST_F(DocumentList, SearchesTheNamesOfItsItems)
+TEST_F(DocumentList, SearchesTheWholeDriveAndSaysWhereItemsLie)
 {
-    const auto list = shownList(drive.makeFolder("Stuff"));
-    deliver(list, {{"Trip", Kind::Folder}, {"Notes.txt"}, {"My trip.txt"}});
-    delegate->take();
-    list->startSearchWithQueryStringBecomeFirstResponder("trip", true);
+    drive.writeDocument("Stuff/Spain/My trip.txt");
+    drive.makeFolder("Stuff/Trip");
+    drive.writeDocument("trip plan.txt");
+    const auto list = shownList(drive.url("Stuff"));
+    list->startSearchWithQueryStringBecomeFirstResponder("TRIP", true);
     drive.dispatch->runUntilIdle();
     const auto search = std::dynamic_pointer_cast<ui::SearchPresentation>(list->presentedViewController());
     ASSERT_TRUE(search);
     EXPECT_TRUE(search->hasFocus());
     const auto results = std::dynamic_pointer_cast<ui::ListView>(search->view()->subviews().front());
     ASSERT_TRUE(results);
-    EXPECT_EQ(results->rowCount(), 2U);
+    results->setFrame({0, 0, 360, 600});
+    results->layoutIfNeeded();
+    drive.dispatch->runUntilIdle();
+    std::map<std::string, std::string> places;
+    for (std::size_t row = 0; row < results->rowCount(); ++row)
+        places[results->row(row).title] = results->row(row).detail;
+    EXPECT_THAT(places,
+        testing::ElementsAre(testing::Pair("My trip.txt", testing::StartsWith("Stuff › Spain · ")),
+            testing::Pair("Trip", testing::StartsWith("Stuff · ")),
+            testing::Pair("trip plan.txt", testing::StartsWith(folderTitle(drive.url(""))))));
 
-    deliver(list, {{"Trip", Kind::Folder}, {"Notes.txt"}});
-    EXPECT_EQ(results->rowCount(), 1U);
+    search->userEditedQuery("my");
+    drive.dispatch->runUntilIdle();
+    ASSERT_EQ(results->rowCount(), 1U);
+    delegate->take();
     results->activateRow(0);
-    EXPECT_EQ(delegate->take(), (Lines{"changed 2 selected 0", "folder Trip Trip"}));
+    results->menuForRow(0).front().handler();
+    EXPECT_EQ(delegate->take(), (Lines{"item My trip.txt", "folder Spain Spain"}));
     search->userEditedQuery("");
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(results->rowCount(), 0U);

@@ -6,6 +6,7 @@
 #include "host/system/GdkPixbufImageLoader.h"
 #include "host/system/GettextLocalization.h"
 #include "host/system/IcuFormatters.h"
+#include "host/system/IndexedNameSearch.h"
 #include "host/system/JsonKeyedArchiver.h"
 #include "host/system/JsonUserDefaults.h"
 #include "host/system/LocalFileCoordinator.h"
@@ -80,6 +81,7 @@ DriveFixture::DriveFixture()
     set.localization = englishTexts();
     set.typeRegistry = types();
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(set.typeRegistry);
+    set.nameSearch = std::make_shared<host::system::IndexedNameSearch>(dispatch, types());
     set.keyedArchiver = std::make_shared<host::system::JsonKeyedArchiver>();
     set.userDefaults = std::make_shared<host::system::JsonUserDefaults>(layout.defaults(), *dispatch);
     host::drive::DriveDependencies dependencies{

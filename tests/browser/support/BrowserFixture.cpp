@@ -56,6 +56,7 @@ BrowserFixture::BrowserFixture()
     set.keyValueStore = borrowed(_driveServices.keyValueStore());
     set.keyedArchiver = borrowed(_driveServices.keyedArchiver());
     set.localization = englishTexts();
+    set.nameSearch = borrowed(_driveServices.nameSearch());
     set.notificationCenter = drive.notifications;
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(types);
     set.storageOfferManager = offers;

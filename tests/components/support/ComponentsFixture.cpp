@@ -90,6 +90,7 @@ ComponentsFixture::ComponentsFixture()
     _set.imageLoader = borrowed(_driveServices.imageLoader());
     _set.linkOpener = links;
     _set.localization = borrowed(_driveServices.localization());
+    _set.nameSearch = borrowed(_driveServices.nameSearch());
     _set.notificationCenter = drive.notifications;
     _set.pagedDocumentOpener = borrowed(_driveServices.pagedDocumentOpener());
     _set.previewSupport = borrowed(_driveServices.previewSupport());
