@@ -1,5 +1,6 @@
 // What two processes on one drive know of each other. The other process is a program of these tests.
 
+#include "host/system/GLibDispatch.h"
 #include "host/system/LocalFileCoordinator.h"
 #include "tests/support/RecordingLog.h"
 #include "tests/support/TemporaryDirectory.h"
@@ -300,6 +301,64 @@ TEST_F(TwoProcessTest, nobodyIsToldWhoHasLeft)
     settle();
     EXPECT_THAT(kept->heard, ElementsAre("changed"));
     EXPECT_EQ(_dispatch->pendingCount(), 0U);
+}
+
+/// Counts what it hears, on any thread, and wakes the main loop.
+class CountingPresenter : public platform::FilePresenter {
+public:
+    CountingPresenter(Url url, std::shared_ptr<platform::OperationQueue> queue)
+        : _url(std::move(url))
+        , _queue(std::move(queue))
+    {
+    }
+    std::atomic<int> changes = 0;
+    std::optional<Url> presentedItemURL() override { return _url; }
+    std::shared_ptr<platform::OperationQueue> presentedItemOperationQueue() override { return _queue; }
+    void presentedItemDidChange() override
+    {
+        ++changes;
+        g_main_context_wakeup(nullptr);
+    }
+
+private:
+    const Url _url;
+    const std::shared_ptr<platform::OperationQueue> _queue;
+};
+
+TEST_F(TwoProcessTest, everybodyIsHeardOnRealThreads)
+{
+    constexpr int rounds = 50;
+    const auto dispatch = std::make_shared<host::system::GLibDispatch>();
+    const auto queue = dispatch->makeOperationQueue("presenters", platform::QualityOfService::Utility);
+    auto chosen = settings();
+    chosen.dispatch = dispatch;
+    chosen.beforeWaiting = nullptr;
+    LocalFileCoordinator coordinator(chosen);
+    const auto url = Url::fileURL(_folder.at(presentedFile));
+    const auto presenter = std::make_shared<CountingPresenter>(url, queue);
+    coordinator.addFilePresenter(presenter);
+
+    std::thread writer([&] {
+        for (int round = 0; round < rounds; ++round)
+            EXPECT_FALSE(coordinator.coordinateWriting(
+                url, WritingOptions::None, [](const Url& at) { std::ofstream(at.path()) << "own"; }));
+    });
+    std::thread visitor([&] {
+        for (int round = 0; round < rounds; ++round)
+            coordinator.addFilePresenter(std::make_shared<CountingPresenter>(url, queue));
+    });
+    for (int round = 0; round < rounds; ++round)
+        EXPECT_EQ(ask("append drive/sub/deep/a.txt"), "done");
+    writer.join();
+    visitor.join();
+    // Each own write is told of; then what the other process does is, sooner or later.
+    while (presenter->changes < rounds)
+        g_main_context_iteration(nullptr, TRUE);
+    for (const int before = presenter->changes; presenter->changes == before;) {
+        EXPECT_EQ(ask("append drive/sub/deep/a.txt"), "done");
+        while (g_main_context_iteration(nullptr, FALSE)) { }
+    }
+    coordinator.removeFilePresenter(*presenter);
 }
 
 TEST_F(TwoProcessTest, withoutWatchesTheItemIsLookedAtNowAndThen)
