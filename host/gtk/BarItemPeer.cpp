@@ -3,6 +3,7 @@
 #include "host/gtk/ButtonPeer.h"
 #include "host/gtk/ImagePaint.h"
 #include "host/gtk/ViewPeer.h"
+#include "platform/Localization.h"
 
 #include <algorithm>
 
@@ -30,6 +31,13 @@ const char* iconOf(ui::SystemItem item)
     default:
         return nullptr;
     }
+}
+
+/// A standard item has the platform's name for it, in English until here.
+std::string nameOf(const ui::BarButtonItem& item)
+{
+    const auto& name = item.accessibilityLabel();
+    return item.systemItem() == ui::SystemItem::Plain ? name : platform::localized(name);
 }
 
 std::optional<platform::Image> imageOf(const ui::BarButtonItem& item)
@@ -128,7 +136,7 @@ void BarItemPeer::mirror(const ui::BarButtonItem& shown)
         gtk_button_set_child(button, icon);
         gtk_widget_add_css_class(widget(), "image-button");
     } else {
-        const auto& title = shown.title().empty() ? shown.accessibilityLabel() : shown.title();
+        const auto title = shown.title().empty() ? nameOf(shown) : shown.title();
         gtk_button_set_label(button, title.c_str());
         gtk_widget_add_css_class(widget(), "text-button");
     }
@@ -136,7 +144,7 @@ void BarItemPeer::mirror(const ui::BarButtonItem& shown)
         gtk_widget_add_css_class(widget(), "suggested-action");
     gtk_widget_set_sensitive(widget(), shown.isEnabled());
     gtk_accessible_update_property(
-        GTK_ACCESSIBLE(widget()), GTK_ACCESSIBLE_PROPERTY_LABEL, shown.accessibilityLabel().c_str(), -1);
+        GTK_ACCESSIBLE(widget()), GTK_ACCESSIBLE_PROPERTY_LABEL, nameOf(shown).c_str(), -1);
 }
 
 } // namespace host::gtk

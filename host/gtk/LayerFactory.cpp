@@ -68,15 +68,17 @@ std::optional<GdkRectangle> anchorOf(
     return std::nullopt;
 }
 
-/// Beside the anchor where only such arrows are allowed and there is room, else below it.
-GtkPositionType sideOf(const ui::PopoverAnchor& anchor, const GdkRectangle& place, double windowWidth)
+/// Beside the anchor where only such arrows are allowed and there is room, else towards the window's middle.
+GtkPositionType sideOf(const ui::PopoverAnchor& anchor, const GdkRectangle& place, platform::Size window)
 {
     const auto* view = std::get_if<ui::ViewAnchor>(&anchor);
-    if (!view || view->arrows != ui::ArrowDirections::LeftOrRight)
-        return GTK_POS_BOTTOM;
-    if (windowWidth - place.x - place.width >= widestPopover)
-        return GTK_POS_RIGHT;
-    return place.x >= widestPopover ? GTK_POS_LEFT : GTK_POS_BOTTOM;
+    if (view && view->arrows == ui::ArrowDirections::LeftOrRight) {
+        if (window.width - place.x - place.width >= widestPopover)
+            return GTK_POS_RIGHT;
+        if (place.x >= widestPopover)
+            return GTK_POS_LEFT;
+    }
+    return place.y + place.height / 2 > window.height / 2 ? GTK_POS_TOP : GTK_POS_BOTTOM;
 }
 
 class LayerMaker : public ui::ViewControllerVisitor {
@@ -142,7 +144,7 @@ private:
     void makePopover(
         ui::ViewController& screen, std::unique_ptr<LayerContent> content, const GdkRectangle& anchor)
     {
-        const auto side = sideOf(screen.popoverAnchor(), anchor, _site.size.width);
+        const auto side = sideOf(screen.popoverAnchor(), anchor, _site.size);
         layer =
             std::make_unique<PopoverLayer>(_site.canvas, anchor, side, std::move(content), cancel(screen));
     }

@@ -74,6 +74,7 @@ void TextFieldPeer::edited()
     auto* editable = GTK_EDITABLE(native());
     if (!field->userEdited(gtk_editable_get_text(editable), selectionOf(editable)))
         showAnew();
+    mirrorClearButton(*field);
 }
 
 void TextFieldPeer::selectionMoved()
@@ -112,15 +113,21 @@ void TextFieldPeer::mirrorContent(const ui::TextField& field)
     gtk_entry_set_placeholder_text(entry, field.placeholder().c_str());
     gtk_entry_set_input_hints(entry, hints(traits));
     gtk_entry_set_attributes(entry, TextLayout::attributes(context().theme(), field.font(), nullptr).get());
-    const bool clears = traits.clearButton == ui::ClearButton::WhileEditing && !field.text().empty();
-    gtk_entry_set_icon_from_icon_name(
-        entry, GTK_ENTRY_ICON_SECONDARY, clears ? "edit-clear-symbolic" : nullptr);
+    mirrorClearButton(field);
     gtk_editable_set_alignment(
         GTK_EDITABLE(entry), field.alignment() == ui::TextAlignment::Center ? 0.5F : 0.0F);
     const auto& label = field.accessibility().label;
     const auto& name = label.empty() ? field.placeholder() : label;
     if (!name.empty())
         setAccessibleName(name);
+}
+
+void TextFieldPeer::mirrorClearButton(const ui::TextField& field)
+{
+    const bool clears =
+        field.inputTraits().clearButton == ui::ClearButton::WhileEditing && !field.text().empty();
+    gtk_entry_set_icon_from_icon_name(
+        GTK_ENTRY(native()), GTK_ENTRY_ICON_SECONDARY, clears ? "edit-clear-symbolic" : nullptr);
 }
 
 void TextFieldPeer::setAccessibleName(const std::string& name)

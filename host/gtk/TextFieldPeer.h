@@ -31,6 +31,7 @@ private:
     void selectionMoved();
     void returnPressed();
     void mirrorContent(const platform::ui::TextField& field);
+    void mirrorClearButton(const platform::ui::TextField& field);
     void mirrorText(const platform::ui::TextField& field);
 
     std::weak_ptr<platform::ui::TextField> _field;
