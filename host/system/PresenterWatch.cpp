@@ -76,9 +76,13 @@ std::vector<PresenterWatch::Asked> PresenterWatch::askPresenters() const
 {
     std::vector<Asked> all;
     for (const auto& weak : _notices->presenters()) {
-        const auto presenter = weak.lock();
-        if (const auto url = presenter ? presenter->presentedItemURL() : std::nullopt)
+        auto presenter = weak.lock();
+        if (!presenter)
+            continue;
+        if (const auto url = presenter->presentedItemURL())
             all.push_back({weak, url->path()});
+        // Whoever owns it may have let go meanwhile, and what owns screens must end where screens live.
+        _dispatch->mainQueue()->async([held = std::move(presenter)] {});
     }
     return all;
 }

@@ -54,11 +54,11 @@ protected:
         _dispatch->runUntilIdle();
         return presenter;
     }
-    /// Lets everything be told that happened until now.
-    void settle()
+    /// Lets events come and time pass: a second is enough for everything to be told.
+    void settle(double seconds = 1)
     {
         while (g_main_context_iteration(nullptr, FALSE)) { }
-        _dispatch->advance(1);
+        _dispatch->advance(seconds);
     }
     /// Sends a command whose words that hold a slash are names in the test's folder.
     std::string ask(const std::string& command) { return _peer.ask(inFolder(command)); }
@@ -158,8 +158,8 @@ TEST_P(PresenterOfAnotherProcess, isToldOnceAndFollowsItsItem)
     LocalFileCoordinator coordinator(settings());
     const auto presenter = present(coordinator, GetParam().presented);
     for (const auto& command : GetParam().commands) {
-        if (command == "settle")
-            settle();
+        if (command == "settle" || command == "pause")
+            settle(command == "pause" ? 0.1 : 1);
         else
             EXPECT_EQ(ask(command), "done");
     }
@@ -187,6 +187,10 @@ INSTANTIATE_TEST_SUITE_P(OfAFile, PresenterOfAnotherProcess,
         {presentedFile, {"write drive/sub/deep/a.txt", "write drive/sub/deep/a.txt"}, {"changed"}},
         {presentedFile, {"save drive/sub/deep/a.txt"}, {"changed"}},
         {presentedFile, {"backup drive/sub/deep/a.txt"}, {"changed"}},
+        {presentedFile,
+            {"rename drive/sub/deep/a.txt drive/sub/deep/a.txt~", "pause", "write drive/sub/deep/a.txt"},
+            {"changed"}},
+        {presentedFile, {"delete drive/sub/deep/a.txt", "pause", "write drive/sub/deep/a.txt"}, {"changed"}},
         {presentedFile, {"rename drive/other/c.txt drive/sub/deep/a.txt"}, {"changed"}},
         {presentedFile, {"evict drive/sub/deep/a.txt cloud/content drive/sub/deep/.a.txt.trwpromise"},
             {"changed"}},
