@@ -102,8 +102,8 @@ ListTimes listOnce(host::system::ThreadedFolderLister& lister, const std::string
 {
     ListTimes times;
     const auto begin = Clock::now();
-    const auto listing =
-        lister.list(platform::Url::fileURL(path), {}, [&](std::shared_ptr<const FolderSnapshot> snapshot) {
+    const auto listing = lister.list(platform::Url::fileURL(path), {}, platform::FolderGrouping::FoldersFirst,
+        [&](std::shared_ptr<const FolderSnapshot> snapshot) {
             const auto now = milliseconds(Clock::now() - begin);
             if (times.firstRows == 0)
                 times.firstRows = now;

@@ -2,6 +2,7 @@
 
 #include "platform/FolderSnapshot.h"
 
+#include <cstdint>
 #include <functional>
 #include <memory>
 #include <vector>
@@ -17,9 +18,11 @@ public:
     virtual void refresh() = 0;
 };
 
-/// Lists folders for the screen, off the main thread: folders and libraries first, then documents, each in
-/// natural order of names in the user's language; a promise shows as the item that it promises; other hidden
-/// names are left out.
+/// Whether folders and libraries come before all documents, or among them by their names.
+enum class FolderGrouping : std::uint8_t { FoldersFirst, Mixed };
+
+/// Lists folders for the screen, off the main thread, in natural order of names in the user's language; a
+/// promise shows as the item that it promises; other hidden names are left out.
 class FolderLister {
 public:
     using Update = std::function<void(std::shared_ptr<const FolderSnapshot>)>;
@@ -30,8 +33,8 @@ public:
     /// once with the first rows, then with the complete list (or with the failure), and again with the
     /// complete list whenever the folder's items changed, never more than once for what one turn of the main
     /// loop brings. Main thread.
-    virtual std::shared_ptr<FolderListing> list(
-        const Url& folder, std::vector<FolderSnapshot::ExtraItem> extraItems, Update update) = 0;
+    virtual std::shared_ptr<FolderListing> list(const Url& folder,
+        std::vector<FolderSnapshot::ExtraItem> extraItems, FolderGrouping grouping, Update update) = 0;
 };
 
 } // namespace platform

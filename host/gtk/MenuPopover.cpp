@@ -49,6 +49,11 @@ void runLater(std::function<void()> handler)
 GtkWidget* makeEntry(const ui::MenuAction& action)
 {
     auto* content = gtk_box_new(GTK_ORIENTATION_HORIZONTAL, 12);
+    if (action.mark != ui::MenuMark::None) {
+        auto* check = gtk_image_new_from_icon_name("object-select-symbolic");
+        gtk_widget_set_opacity(check, action.mark == ui::MenuMark::On ? 1 : 0);
+        gtk_box_append(GTK_BOX(content), check);
+    }
     auto* title = gtk_label_new(action.title.c_str());
     gtk_label_set_xalign(GTK_LABEL(title), 0);
     gtk_widget_set_hexpand(title, TRUE);
@@ -67,6 +72,10 @@ GtkWidget* makeEntry(const ui::MenuAction& action)
     gtk_widget_set_sensitive(entry, action.enabled);
     gtk_accessible_update_property(
         GTK_ACCESSIBLE(entry), GTK_ACCESSIBLE_PROPERTY_LABEL, action.title.c_str(), -1);
+    if (action.mark != ui::MenuMark::None)
+        gtk_accessible_update_state(GTK_ACCESSIBLE(entry), GTK_ACCESSIBLE_STATE_PRESSED,
+            action.mark == ui::MenuMark::On ? GTK_ACCESSIBLE_TRISTATE_TRUE : GTK_ACCESSIBLE_TRISTATE_FALSE,
+            -1);
     return entry;
 }
 
@@ -79,6 +88,8 @@ void showMenu(GtkWidget* parent, double x, double y, const ui::Menu& menu)
     auto* popover = gtk_popover_new();
     auto* entries = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
     for (const auto& action : menu) {
+        if (action.beginsSection)
+            gtk_box_append(GTK_BOX(entries), gtk_separator_new(GTK_ORIENTATION_HORIZONTAL));
         auto* entry = makeEntry(action);
         connectForLife<void()>(entry, "clicked", [popover, handler = action.handler] {
             gtk_popover_popdown(GTK_POPOVER(popover));

@@ -1,6 +1,7 @@
 #include "host/gtk/NavigationBarPeer.h"
 
 #include "host/gtk/ButtonPeer.h"
+#include "host/gtk/MenuPopover.h"
 #include "platform/Localization.h"
 #include "platform/ui/NavigationItem.h"
 
@@ -29,11 +30,17 @@ NavigationBarPeer::NavigationBarPeer(std::shared_ptr<PeerContext> context)
     , _title(adw_window_title_new("", ""))
     , _back(makeIconButton("go-previous-symbolic", platform::localized("Back")))
     , _search(makeIconButton("system-search-symbolic", platform::localized("Search")))
+    , _menu(makeIconButton("view-more-symbolic", std::string()))
 {
     auto* bar = ADW_HEADER_BAR(widget());
     adw_header_bar_set_title_widget(bar, _title);
     adw_header_bar_pack_start(bar, _back);
+    adw_header_bar_pack_end(bar, _menu);
     adw_header_bar_pack_end(bar, _search);
+    _connections.push_back(connectSignal<void()>(_menu, "clicked", [this] {
+        if (const auto make = _makeMenu)
+            showMenu(_menu, gtk_widget_get_width(_menu) / 2.0, gtk_widget_get_height(_menu), make());
+    }));
     _connections.push_back(connectSignal<void()>(_back, "clicked", [this] {
         if (const auto call = _onBack)
             call();
@@ -57,6 +64,7 @@ void NavigationBarPeer::show(const ui::NavigationItem& item, bool hasBackTarget)
     const bool replaced = !item.leftItems().empty() && !item.leftItemsSupplementBackButton();
     gtk_widget_set_visible(_back, hasBackTarget && !item.hidesBackButton() && !replaced);
     showSearch(item);
+    showMenuButton(item);
     if (item.leftItems() != _left || item.rightItems() != _right)
         showItems(item);
 }
@@ -65,6 +73,15 @@ void NavigationBarPeer::showSearch(const ui::NavigationItem& item)
 {
     _onSearch = item.searchAction();
     gtk_widget_set_visible(_search, static_cast<bool>(_onSearch));
+}
+
+void NavigationBarPeer::showMenuButton(const ui::NavigationItem& item)
+{
+    _makeMenu = item.menu();
+    gtk_widget_set_visible(_menu, static_cast<bool>(_makeMenu));
+    gtk_widget_set_tooltip_text(_menu, item.menuName().c_str());
+    gtk_accessible_update_property(
+        GTK_ACCESSIBLE(_menu), GTK_ACCESSIBLE_PROPERTY_LABEL, item.menuName().c_str(), -1);
 }
 
 void NavigationBarPeer::clearItems()

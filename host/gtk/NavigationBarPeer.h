@@ -2,6 +2,8 @@
 
 #include "host/gtk/BarItemPeer.h"
 
+#include "platform/ui/Menu.h"
+
 #include <functional>
 #include <vector>
 
@@ -31,14 +33,16 @@ public:
 private:
     void showItems(const platform::ui::NavigationItem& item);
     void showSearch(const platform::ui::NavigationItem& item);
+    void showMenuButton(const platform::ui::NavigationItem& item);
     void clearItems();
 
     std::shared_ptr<PeerContext> _context;
     ObjectRef<GtkWidget> _bar;
-    GtkWidget *_title, *_back, *_search;
+    GtkWidget *_title, *_back, *_search, *_menu;
     platform::ui::BarButtonItems _left, _right;
     std::vector<std::shared_ptr<BarItemPeer>> _peers;
     std::function<void()> _onBack, _onSearch;
+    std::function<platform::ui::Menu()> _makeMenu;
     SignalConnections _connections;
 };
 

@@ -71,11 +71,9 @@ void forEachEntry(const std::vector<std::shared_ptr<ListingBlock>>& blocks, cons
 
 } // namespace
 
-FolderReading::FolderReading(
-    std::shared_ptr<const ListingTools> tools, platform::Url folder, ExtraItems extraItems, Handlers handlers)
+FolderReading::FolderReading(std::shared_ptr<const ListingTools> tools, Subject subject, Handlers handlers)
     : _tools(std::move(tools))
-    , _folder(std::move(folder))
-    , _extraItems(std::move(extraItems))
+    , _subject(std::move(subject))
     , _handlers(std::move(handlers))
 {
 }
@@ -90,7 +88,7 @@ void FolderReading::open()
 {
     if (_isCancelled)
         return;
-    _descriptor = openFolder(_folder.path());
+    _descriptor = openFolder(_subject.folder.path());
     if (!_descriptor)
         return fail(errno);
     _handlers.opened(_descriptor);
@@ -100,8 +98,9 @@ void FolderReading::open()
 
 void FolderReading::fail(int errorNumber)
 {
-    FolderSnapshot::Builder builder(_folder);
-    _handlers.snapshot(builder.finish(ListingStage::Failed, systemError(errorNumber, _folder.path())));
+    FolderSnapshot::Builder builder(_subject.folder);
+    _handlers.snapshot(
+        builder.finish(ListingStage::Failed, systemError(errorNumber, _subject.folder.path())));
 }
 
 void FolderReading::readBlock()
@@ -113,7 +112,7 @@ void FolderReading::readBlock()
     if (isLast)
         appendExtraItems(*block);
     if (isLast && _reader->errorNumber())
-        _error = systemError(_reader->errorNumber(), _folder.path());
+        _error = systemError(_reader->errorNumber(), _subject.folder.path());
     _blocks.push_back(block);
     if (!isLast) {
         ++_unfinished;
@@ -141,13 +140,13 @@ std::shared_ptr<ListingBlock> FolderReading::fillBlock()
 void FolderReading::appendExtraItems(ListingBlock& block)
 {
     std::int32_t index = 0;
-    for (const auto& item : _extraItems)
+    for (const auto& item : _subject.extraItems)
         block.append({item.name, item.kind, false}, index++);
 }
 
 void FolderReading::finishBlock(ListingBlock& block)
 {
-    block.sort(_tools->order);
+    block.sort(_tools->order, _subject.grouping);
     if (--_unfinished == 0 && !_isCancelled)
         merge();
 }
@@ -170,7 +169,7 @@ std::unordered_set<std::string_view> FolderReading::promisesOfPresentItems() con
 void FolderReading::appendRow(FolderSnapshot::Builder& builder, const ListingBlock& block, std::size_t number)
 {
     if (const auto extra = block.extra(number); extra >= 0)
-        return builder.append(_extraItems[static_cast<std::size_t>(extra)]);
+        return builder.append(_subject.extraItems[static_cast<std::size_t>(extra)]);
     const auto entry = block.entry(number);
     builder.append(entry.name, entry.kind, entry.isPromise);
 }
@@ -184,7 +183,7 @@ void FolderReading::merge()
     }
     const auto leftOut = promisesOfPresentItems();
     const bool wantsFirstRows = count >= manyRows && !_error;
-    FolderSnapshot::Builder all(_folder), first(_folder);
+    FolderSnapshot::Builder all(_subject.folder), first(_subject.folder);
     all.reserve(count, nameBytes);
     for (MergedBlocks merged(_blocks); !merged.isAtEnd();) {
         const auto [block, number] = merged.next();

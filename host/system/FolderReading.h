@@ -5,7 +5,7 @@
 #include "host/system/ListingBlock.h"
 #include "host/system/NameOrder.h"
 #include "platform/Dispatch.h"
-#include "platform/FolderSnapshot.h"
+#include "platform/FolderLister.h"
 
 #include <atomic>
 #include <functional>
@@ -31,6 +31,12 @@ struct ListingTools {
 class FolderReading : public std::enable_shared_from_this<FolderReading> {
 public:
     using ExtraItems = std::vector<platform::FolderSnapshot::ExtraItem>;
+    /// What is listed, and how.
+    struct Subject {
+        platform::Url folder;
+        ExtraItems extraItems;
+        platform::FolderGrouping grouping;
+    };
     struct Handlers {
         /// Called once with the open folder, before the first entry is read.
         std::function<void(const FileDescriptor&)> opened;
@@ -39,8 +45,7 @@ public:
     };
 
     /// The handlers are called on threads of the queue.
-    FolderReading(std::shared_ptr<const ListingTools> tools, platform::Url folder, ExtraItems extraItems,
-        Handlers handlers);
+    FolderReading(std::shared_ptr<const ListingTools> tools, Subject subject, Handlers handlers);
 
     void start();
     /// No handler begins after the work that runs now.
@@ -58,8 +63,7 @@ private:
     void fail(int errorNumber);
 
     const std::shared_ptr<const ListingTools> _tools;
-    const platform::Url _folder;
-    ExtraItems _extraItems;
+    const Subject _subject;
     const Handlers _handlers;
     std::atomic<bool> _isCancelled = false;
 

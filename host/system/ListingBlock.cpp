@@ -38,15 +38,16 @@ FolderEntry ListingBlock::entry(std::size_t number) const
     return {std::string_view(_names).substr(entry.nameOffset, entry.nameLength), entry.kind, entry.isPromise};
 }
 
-void ListingBlock::sort(const NameOrder& order)
+void ListingBlock::sort(const NameOrder& order, platform::FolderGrouping grouping)
 {
     _keys.reserve(_names.size() * 2 + 1024);
     _ranks.reserve(_entries.size());
     for (std::size_t number = 0; number < _entries.size(); ++number) {
         const auto kind = _entries[number].kind;
         const auto begin = _keys.size();
-        // Folders and libraries come first, whatever their names.
-        _keys.push_back(kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library ? 0 : 1);
+        const bool isFolder = kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
+        // What is grouped comes first, whatever its name.
+        _keys.push_back(isFolder && grouping == platform::FolderGrouping::FoldersFirst ? 0 : 1);
         order.appendKey(entry(number).name, _keys);
         _ranks.push_back(makeRank(number, begin));
     }

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/FolderSnapshot.h"
+#include "platform/FolderLister.h"
 
 #include <compare>
 #include <cstdint>
@@ -21,7 +21,7 @@ public:
     std::size_t nameBytes() const { return _names.size(); }
 
     /// Sorts the block. Entries keep their numbers; rank() tells their places.
-    void sort(const NameOrder& order);
+    void sort(const NameOrder& order, platform::FolderGrouping grouping);
 
     /// The entry at a number; the name lives as long as the block, once nothing more is appended.
     platform::FolderEntry entry(std::size_t number) const;

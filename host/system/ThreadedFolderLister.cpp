@@ -15,11 +15,12 @@ ThreadedFolderLister::ThreadedFolderLister(std::shared_ptr<platform::Dispatch> d
 
 ThreadedFolderLister::~ThreadedFolderLister() = default;
 
-std::shared_ptr<platform::FolderListing> ThreadedFolderLister::list(
-    const platform::Url& folder, std::vector<platform::FolderSnapshot::ExtraItem> extraItems, Update update)
+std::shared_ptr<platform::FolderListing> ThreadedFolderLister::list(const platform::Url& folder,
+    std::vector<platform::FolderSnapshot::ExtraItem> extraItems, platform::FolderGrouping grouping,
+    Update update)
 {
-    auto listing =
-        std::make_shared<WatchedListing>(_dispatch, _tools, folder, std::move(extraItems), std::move(update));
+    auto listing = std::make_shared<WatchedListing>(_dispatch, _tools,
+        FolderReading::Subject{folder, std::move(extraItems), grouping}, std::move(update));
     listing->refresh();
     return listing;
 }

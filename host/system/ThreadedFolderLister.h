@@ -24,7 +24,8 @@ public:
     ~ThreadedFolderLister() override;
 
     std::shared_ptr<platform::FolderListing> list(const platform::Url& folder,
-        std::vector<platform::FolderSnapshot::ExtraItem> extraItems, Update update) override;
+        std::vector<platform::FolderSnapshot::ExtraItem> extraItems, platform::FolderGrouping grouping,
+        Update update) override;
 
 private:
     std::shared_ptr<platform::Dispatch> _dispatch;

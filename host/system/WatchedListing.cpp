@@ -39,12 +39,11 @@ private:
 };
 
 WatchedListing::WatchedListing(std::shared_ptr<platform::Dispatch> dispatch,
-    std::shared_ptr<const ListingTools> tools, platform::Url folder, FolderReading::ExtraItems extraItems,
+    std::shared_ptr<const ListingTools> tools, FolderReading::Subject subject,
     platform::FolderLister::Update update)
     : _dispatch(std::move(dispatch))
     , _tools(std::move(tools))
-    , _folder(std::move(folder))
-    , _extraItems(std::move(extraItems))
+    , _subject(std::move(subject))
     , _update(std::move(update))
     , _inbox(std::make_shared<Inbox>())
 {
@@ -83,8 +82,7 @@ void WatchedListing::startReading()
     };
     // The watch begins before the reading, so that no change falls between them.
     const auto watch = [watcher = _watcher](const FileDescriptor& folder) { watcher->watch(folder); };
-    _reading =
-        std::make_shared<FolderReading>(_tools, _folder, _extraItems, FolderReading::Handlers{watch, put});
+    _reading = std::make_shared<FolderReading>(_tools, _subject, FolderReading::Handlers{watch, put});
     _reading->start();
 }
 

@@ -14,7 +14,7 @@ namespace host::system {
 class WatchedListing : public platform::FolderListing, public std::enable_shared_from_this<WatchedListing> {
 public:
     WatchedListing(std::shared_ptr<platform::Dispatch> dispatch, std::shared_ptr<const ListingTools> tools,
-        platform::Url folder, FolderReading::ExtraItems extraItems, platform::FolderLister::Update update);
+        FolderReading::Subject subject, platform::FolderLister::Update update);
     ~WatchedListing() override;
 
     void refresh() override;
@@ -28,8 +28,7 @@ private:
 
     const std::shared_ptr<platform::Dispatch> _dispatch;
     const std::shared_ptr<const ListingTools> _tools;
-    const platform::Url _folder;
-    const FolderReading::ExtraItems _extraItems;
+    const FolderReading::Subject _subject;
     const platform::FolderLister::Update _update;
     std::shared_ptr<FolderWatcher> _watcher;
     std::shared_ptr<Inbox> _inbox;

@@ -53,8 +53,10 @@ std::vector<std::shared_ptr<DocumentListController>> DocumentListController::hie
 DocumentListController::DocumentListController(std::optional<Url> folder)
     : _presentedURL(std::move(folder))
 {
-    if (_presentedURL)
-        setTitle(folderTitle(*_presentedURL));
+    if (!_presentedURL)
+        return;
+    setTitle(folderTitle(*_presentedURL));
+    _order = savedOrder(*_presentedURL);
 }
 
 DocumentListController::~DocumentListController() = default;
@@ -103,6 +105,10 @@ void DocumentListController::viewDidLoad()
         });
     if (!_presentedURL)
         return;
+    navigationItem().setMenu(localized("Order and Options"), [weak = std::weak_ptr(self())] {
+        const auto list = weak.lock();
+        return list ? list->optionsMenu() : ui::Menu();
+    });
     _contents = FolderContents::create(
         *_presentedURL, [weak = std::weak_ptr(self())](const FolderContentsUpdate& update) {
             if (const auto list = weak.lock())
@@ -115,7 +121,7 @@ void DocumentListController::viewDidLoad()
 void DocumentListController::refresh()
 {
     if (_contents)
-        _contents->start(extraItemsOf(*_presentedURL));
+        _contents->start(extraItemsOf(*_presentedURL), _order);
 }
 
 void DocumentListController::viewDidAppear(bool animated)

@@ -5,6 +5,7 @@
 #include "platform/Url.h"
 #include "platform/components/DocumentListAction.h"
 #include "platform/components/DocumentListControllerDelegate.h"
+#include "platform/components/ListOrder.h"
 #include "platform/ui/ListViewDelegate.h"
 #include "platform/ui/ViewController.h"
 
@@ -84,6 +85,13 @@ public:
     /// Lists the folder anew.
     void refresh();
 
+    /// The order of the items; the user's choice for this folder at first.
+    const ListOrder& order() const { return _order; }
+    /// Shows another order and keeps it for the folder.
+    void setOrder(const ListOrder& order);
+    /// The choices of order, and while editing what can be selected at once.
+    ui::Menu optionsMenu();
+
     /// Objects that others attach to the list, kept as long as it lives; null removes. Ask with the type that
     /// was attached.
     void setAssociatedObject(const std::string& key, std::shared_ptr<void> object);
@@ -105,6 +113,7 @@ public:
 private:
     void rowActivated(ui::ListView& list, std::size_t index) override;
     ui::Menu menuForRow(ui::ListView& list, std::size_t index) override;
+    ui::Menu menuForList(ui::ListView&) override { return optionsMenu(); }
     void visibleRowsDidChange(ui::ListView& list, ui::RowRange range) override;
     void selectionDidChange(ui::ListView& list) override;
     void refreshRequested(ui::ListView& list) override;
@@ -132,6 +141,7 @@ private:
     std::shared_ptr<DocumentSearch> _search;
     std::map<std::string, std::shared_ptr<void>> _associatedObjects;
     DocumentListActionSet _availableActions = 0;
+    ListOrder _order;
     bool _editing = false;
     std::optional<ListingStage> _state; ///< of the latest update; nothing before the first
     std::optional<Error> _failure;

@@ -64,13 +64,24 @@ std::vector<ui::RowRange> rowsOfOtherAppearance(const DocumentRows& before, cons
 
 } // namespace
 
-std::shared_ptr<const DocumentRows> DocumentRows::make(std::shared_ptr<const FolderSnapshot> snapshot)
+std::shared_ptr<const DocumentRows> DocumentRows::make(
+    std::shared_ptr<const FolderSnapshot> snapshot, const ListOrder& order)
 {
     const std::shared_ptr<DocumentRows> rows(new DocumentRows(std::move(snapshot)));
     rows->_ids.reserve(rows->_snapshot->count());
     for (std::size_t i = 0; i < rows->_snapshot->count(); ++i)
         rows->append(i);
+    if (!order.isListersOwn())
+        rows->sort(order);
     return rows;
+}
+
+void DocumentRows::sort(const ListOrder& order)
+{
+    _indexes = orderedIndexes(*_snapshot, order);
+    const auto ids = _ids;
+    for (std::size_t row = 0; row < _indexes.size(); ++row)
+        _ids[row] = ids[_indexes[row]];
 }
 
 std::shared_ptr<const DocumentRows> DocumentRows::matching(

@@ -2,6 +2,7 @@
 
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
+#include "platform/components/ListOrder.h"
 #include "platform/ui/ListChanges.h"
 
 #include <cstdint>
@@ -13,11 +14,13 @@
 
 namespace platform::components {
 
-/// The rows that a folder list shows: the items of one snapshot with the identifiers of their rows, or those
-/// of them whose name holds a text. Immutable; any thread. To make one takes a pass over all names.
+/// The rows that a folder list shows: the items of one snapshot in some order, with the identifiers of their
+/// rows, or those of them whose name holds a text. Immutable; any thread. To make one takes a pass over all
+/// names, and what orderedIndexes() takes.
 class DocumentRows {
 public:
-    static std::shared_ptr<const DocumentRows> make(std::shared_ptr<const FolderSnapshot> snapshot);
+    static std::shared_ptr<const DocumentRows> make(
+        std::shared_ptr<const FolderSnapshot> snapshot, const ListOrder& order = {});
     /// The rows of a snapshot whose names hold a text; capital and small ASCII letters are the same.
     static std::shared_ptr<const DocumentRows> matching(
         std::shared_ptr<const FolderSnapshot> snapshot, std::string_view text);
@@ -51,6 +54,7 @@ private:
     }
     std::size_t snapshotIndex(std::size_t row) const { return _indexes.empty() ? row : _indexes[row]; }
     void append(std::size_t snapshotIndex);
+    void sort(const ListOrder& order);
 
     std::shared_ptr<const FolderSnapshot> _snapshot;
     std::vector<ui::RowId> _ids;

@@ -9,11 +9,12 @@ namespace platform::components {
 
 namespace {
 
-FolderContentsUpdate updateBetween(const DocumentRows& before, std::shared_ptr<const FolderSnapshot> snapshot)
+FolderContentsUpdate updateBetween(
+    const DocumentRows& before, std::shared_ptr<const FolderSnapshot> snapshot, const ListOrder& order)
 {
     const auto stage = snapshot->stage();
     const auto error = snapshot->error();
-    const auto after = DocumentRows::make(std::move(snapshot));
+    const auto after = DocumentRows::make(std::move(snapshot), order);
     return {after, DocumentRows::changes(before, *after), stage, error};
 }
 
@@ -32,10 +33,11 @@ FolderContents::FolderContents(Url folder, Update update)
 {
 }
 
-void FolderContents::start(std::vector<FolderSnapshot::ExtraItem> extraItems)
+void FolderContents::start(std::vector<FolderSnapshot::ExtraItem> extraItems, const ListOrder& order)
 {
+    _order = order;
     _listing = services().folderLister().list(
-        _folder, std::move(extraItems), [weak = weak_from_this()](Snapshot snapshot) {
+        _folder, std::move(extraItems), order.grouping, [weak = weak_from_this()](Snapshot snapshot) {
             if (const auto self = weak.lock())
                 self->snapshotArrived(std::move(snapshot));
         });
@@ -44,7 +46,9 @@ void FolderContents::start(std::vector<FolderSnapshot::ExtraItem> extraItems)
 void FolderContents::snapshotArrived(Snapshot snapshot)
 {
     // After the first rows of a listing anew, the complete list that is shown already says more.
-    if (snapshot->stage() == ListingStage::FirstRows && _rows->count() >= snapshot->count())
+    const bool isBeginning = snapshot->stage() == ListingStage::FirstRows;
+    // The first rows of another order than the lister's are not known before all rows are.
+    if (isBeginning && (_rows->count() >= snapshot->count() || !_order.isListersOwn()))
         return;
     if (_isWorking)
         _waiting = std::move(snapshot);
@@ -54,8 +58,8 @@ void FolderContents::snapshotArrived(Snapshot snapshot)
 
 void FolderContents::workOut(Snapshot snapshot)
 {
-    if (std::max(snapshot->count(), _rows->count()) <= immediateRows)
-        adopt(updateBetween(*_rows, std::move(snapshot)));
+    if (std::max(snapshot->count(), _rows->count()) <= immediateRows && !_order.needsLooks())
+        adopt(updateBetween(*_rows, std::move(snapshot), _order));
     else
         workOutInBackground(std::move(snapshot));
 }
@@ -64,8 +68,9 @@ void FolderContents::workOutInBackground(Snapshot snapshot)
 {
     _isWorking = true;
     const auto main = services().dispatch().mainQueue();
-    _queue->addOperation([weak = weak_from_this(), before = _rows, snapshot, main] {
-        const auto update = std::make_shared<const FolderContentsUpdate>(updateBetween(*before, snapshot));
+    _queue->addOperation([weak = weak_from_this(), before = _rows, snapshot, order = _order, main] {
+        const auto update =
+            std::make_shared<const FolderContentsUpdate>(updateBetween(*before, snapshot, order));
         main->async([weak, update] {
             const auto self = weak.lock();
             if (!self)

@@ -35,7 +35,7 @@ public:
 
     /// Lists the folder, and the extra items with it, from the beginning; what is shown stays until the new
     /// list is there.
-    void start(std::vector<FolderSnapshot::ExtraItem> extraItems);
+    void start(std::vector<FolderSnapshot::ExtraItem> extraItems, const ListOrder& order);
 
     const std::shared_ptr<const DocumentRows>& rows() const { return _rows; }
 
@@ -49,6 +49,7 @@ private:
     Url _folder;
     Update _update;
     std::shared_ptr<const DocumentRows> _rows;
+    ListOrder _order;
     std::shared_ptr<FolderListing> _listing;
     std::shared_ptr<OperationQueue> _queue;
     Snapshot _waiting; ///< the newest one that arrived while a difference is worked out

@@ -75,6 +75,7 @@ void MoveTargetScreen::viewDidLoad()
         std::shared_ptr<ui::ListViewDelegate>(self(), static_cast<ui::ListViewDelegate*>(this)));
     _listing = services().folderLister().list(_folder,
         showsLibraries ? extraItemsOf(_folder) : std::vector<FolderSnapshot::ExtraItem>(),
+        FolderGrouping::FoldersFirst,
         [weak = std::weak_ptr(self())](const std::shared_ptr<const FolderSnapshot>& snapshot) {
             if (const auto screen = weak.lock())
                 screen->snapshotArrived(snapshot);

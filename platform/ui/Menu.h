@@ -11,13 +11,18 @@ namespace platform::ui {
 
 enum class MenuActionStyle { Default, Destructive };
 
+/// Whether an entry is a choice, and if it is the present one.
+enum class MenuMark { None, Off, On };
+
 /// One entry of a context menu.
 struct MenuAction {
     std::string title;
     std::function<void()> handler;
     MenuActionStyle style = MenuActionStyle::Default;
     bool enabled = true;
-    std::optional<Image> image;
+    std::optional<Image> image{};
+    MenuMark mark = MenuMark::None;
+    bool beginsSection = false; ///< a line stands above it
 };
 
 using Menu = std::vector<MenuAction>;

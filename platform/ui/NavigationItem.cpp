@@ -57,4 +57,11 @@ void NavigationItem::setSearchAction(std::function<void()> action)
     _onChange();
 }
 
+void NavigationItem::setMenu(std::string name, MenuMaker menu)
+{
+    _menuName = std::move(name);
+    _menu = std::move(menu);
+    _onChange();
+}
+
 } // namespace platform::ui

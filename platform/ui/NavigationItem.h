@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/ui/BarButtonItem.h"
+#include "platform/ui/Menu.h"
 
 #include <functional>
 
@@ -34,6 +35,12 @@ public:
     const std::function<void()>& searchAction() const { return _searchAction; }
     void setSearchAction(std::function<void()> action);
 
+    /// The menu of the bar's menu button, asked for when it is pressed; absent: no such button.
+    using MenuMaker = std::function<Menu()>;
+    const MenuMaker& menu() const { return _menu; }
+    const std::string& menuName() const { return _menuName; }
+    void setMenu(std::string name, MenuMaker menu);
+
 private:
     template <typename T>
     void set(T& field, T value);
@@ -43,6 +50,8 @@ private:
     BarButtonItems _leftItems, _rightItems;
     bool _hidesBackButton = false, _leftItemsSupplementBackButton = false;
     std::function<void()> _searchAction;
+    std::string _menuName;
+    MenuMaker _menu;
 };
 
 } // namespace platform::ui

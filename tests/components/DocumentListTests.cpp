@@ -382,6 +382,83 @@ TEST_F(DocumentList, ReportsARemovedFolderOnceAndOnlyWhileItIsShown)
     EXPECT_EQ(delegate->take(), (Lines{"changed 0 selected 0"}));
 }
 
+TEST_F(DocumentList, ShowsItsItemsInTheChosenOrder)
+{
+    using Direction = OrderDirection;
+    const auto setTime = [&](const char* name, int seconds) {
+        const std::filesystem::file_time_type time{std::chrono::seconds(seconds)};
+        std::filesystem::last_write_time(drive.url(name).path(), time);
+    };
+    drive.writeDocument("Stuff/a.txt", "12345");
+    drive.writeDocument("Stuff/b.pdf", "1");
+    drive.writeDocument("Stuff/c.txt", "123");
+    drive.makeFolder("Stuff/Z");
+    host::drive::PromiseRecord far;
+    far.size = 4;
+    drive.writePromise("Stuff/far.txt", far);
+    setTime("Stuff/a.txt", 10);
+    setTime("Stuff/b.pdf", 30);
+    setTime("Stuff/c.txt", 20);
+    const struct {
+        ListOrder order;
+        Lines titles;
+    } rows[] = {
+        {{OrderKey::Name, Direction::Descending}, {"Z", "far.txt", "c.txt", "b.pdf", "a.txt"}},
+        {{OrderKey::Date, Direction::Descending}, {"Z", "b.pdf", "c.txt", "a.txt", "far.txt"}},
+        {{OrderKey::Date, Direction::Ascending}, {"Z", "far.txt", "a.txt", "c.txt", "b.pdf"}},
+        {{OrderKey::Size, Direction::Descending}, {"Z", "a.txt", "far.txt", "c.txt", "b.pdf"}},
+        {{OrderKey::Kind, Direction::Ascending}, {"Z", "b.pdf", "a.txt", "c.txt", "far.txt"}},
+        {{OrderKey::Name, Direction::Ascending}, {"Z", "a.txt", "b.pdf", "c.txt", "far.txt"}},
+    };
+    const HandLister::Entries entries{
+        {"Z", Kind::Folder}, {"a.txt"}, {"b.pdf"}, {"c.txt"}, {"far.txt", Kind::Document, true}};
+    const auto list = shownList(drive.url("Stuff"));
+    deliver(list, entries);
+    list->setEditingAnimated(true, false);
+    list->setSelectedItems({drive.url("Stuff/c.txt")});
+    for (const auto& row : rows) {
+        list->setOrder(row.order);
+        deliver(list, entries);
+        EXPECT_EQ(titles(list), row.titles);
+        EXPECT_EQ(list->selectedItems(), std::vector{drive.url("Stuff/c.txt")});
+        EXPECT_EQ(shownList(drive.url("Stuff"))->order(), row.order) << "kept for the folder";
+    }
+    list->setOrder({OrderKey::Name, Direction::Ascending, FolderGrouping::Mixed});
+    EXPECT_EQ(lister->grouping(), FolderGrouping::Mixed);
+    EXPECT_EQ(shownList(drive.makeFolder("Other"))->order(), ListOrder());
+}
+
+TEST_F(DocumentList, OffersTheOrdersInAMenu)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    deliver(list, {{"a"}, {"b"}});
+    const auto choose = [&](const std::string& title) {
+        for (const auto& entry : list->listView()->menuForList()) {
+            if (entry.title == title)
+                entry.handler();
+        }
+    };
+    const auto marked = [&] {
+        Lines titles;
+        for (const auto& entry : list->navigationItem().menu()())
+            if (entry.mark == ui::MenuMark::On)
+                titles.push_back(entry.title);
+        return titles;
+    };
+    EXPECT_EQ(marked(), (Lines{"Name", "Ascending", "Folders First"}));
+    choose("Size");
+    EXPECT_EQ(marked(), (Lines{"Size", "Descending", "Folders First"}));
+    choose("Ascending");
+    choose("Folders First");
+    EXPECT_EQ(marked(), (Lines{"Size", "Ascending"}));
+    list->setEditingAnimated(true, false);
+    deliver(list, {{"a"}, {"b"}});
+    choose("Select All");
+    EXPECT_EQ(list->selectedItemCount(), 2U);
+    choose("Select None");
+    EXPECT_EQ(list->selectedItemCount(), 0U);
+}
+
 TEST_F(DocumentList, ListsAnewWhenItIsPulled)
 {
     const auto list = shownList(drive.makeFolder("Stuff"));

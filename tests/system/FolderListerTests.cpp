@@ -39,7 +39,7 @@ protected:
     std::shared_ptr<FolderListing> list(
         const std::string& path, std::vector<FolderSnapshot::ExtraItem> extras = {})
     {
-        return lister.list(Url::fileURL(path, PathKind::Directory), std::move(extras),
+        return lister.list(Url::fileURL(path, PathKind::Directory), std::move(extras), grouping,
             [this](Snapshot snapshot) { updates.push_back(std::move(snapshot)); });
     }
     /// Lists a folder to its end; the listing then ends.
@@ -62,6 +62,7 @@ protected:
         ASSERT_GT(updates.size(), before);
     }
 
+    platform::FolderGrouping grouping = platform::FolderGrouping::FoldersFirst;
     TemporaryDirectory directory;
     std::shared_ptr<VirtualDispatch> dispatch = VirtualDispatch::create();
     std::shared_ptr<MimeTypeRegistry> types = std::make_shared<MimeTypeRegistry>();
@@ -123,6 +124,10 @@ TEST_F(FolderListerTest, ExtraItemsStandAmongTheFolders)
     EXPECT_EQ(snapshot->extraItem(1)->iconName, "mail-icon");
     EXPECT_EQ(snapshot->url(1), library);
     EXPECT_EQ(snapshot->extraItem(0), nullptr);
+
+    grouping = platform::FolderGrouping::Mixed;
+    EXPECT_EQ(names(listOnce(directory.path(), {{library, "Mail", FolderEntryKind::Library, {}}})),
+        (std::vector<std::string>{"a.txt", "Alpha", "Mail", "Omega"}));
 }
 
 TEST_F(FolderListerTest, OrderFollowsTheLanguage)
@@ -131,8 +136,9 @@ TEST_F(FolderListerTest, OrderFollowsTheLanguage)
         directory.write(name, "");
     EXPECT_EQ(names(listOnce(directory.path())), (std::vector<std::string>{"o", "ö", "z"}));
     ThreadedFolderLister swedish(dispatch, types, "sv_SE");
-    const auto listing = swedish.list(Url::fileURL(directory.path().string()), {},
-        [this](Snapshot snapshot) { updates.push_back(std::move(snapshot)); });
+    const auto listing =
+        swedish.list(Url::fileURL(directory.path().string()), {}, platform::FolderGrouping::FoldersFirst,
+            [this](Snapshot snapshot) { updates.push_back(std::move(snapshot)); });
     dispatch->runUntilIdle();
     EXPECT_EQ(names(updates.back()), (std::vector<std::string>{"o", "z", "ö"}));
 }
@@ -207,7 +213,7 @@ TEST_F(LargeFolderTest, RealThreadsGiveTheSameList)
         ASSERT_TRUE(done());
     };
     const auto url = Url::fileURL(directory.at("large"));
-    auto listing = threaded.list(url, {}, [this](Snapshot snapshot) {
+    auto listing = threaded.list(url, {}, platform::FolderGrouping::FoldersFirst, [this](Snapshot snapshot) {
         EXPECT_EQ(snapshot->stage() == ListingStage::FirstRows, snapshot->count() < 20'000);
         expectNaturalOrder(snapshot);
         updates.push_back(std::move(snapshot));
@@ -215,7 +221,8 @@ TEST_F(LargeFolderTest, RealThreadsGiveTheSameList)
     run([&] { return !updates.empty() && updates.back()->stage() == ListingStage::Complete; });
     // Listings that end at any moment never call again.
     for (int i = 0; i < 20; ++i) {
-        listing = threaded.list(url, {}, [](auto) { ADD_FAILURE() << "called after its end"; });
+        listing = threaded.list(url, {}, platform::FolderGrouping::FoldersFirst,
+            [](auto) { ADD_FAILURE() << "called after its end"; });
         listing.reset();
     }
     bool later = false;
@@ -259,10 +266,11 @@ TEST_F(FolderListerTest, FolderThatGoesAwayIsReportedAndUpdatesMayEndTheListing)
         waitForUpdate();
     EXPECT_TRUE(updates.back()->error()->is(FileErrorCode::NoSuchItem));
     int calls = 0;
-    listing = lister.list(Url::fileURL(directory.path().string()), {}, [&](Snapshot) {
-        ++calls;
-        listing.reset();
-    });
+    listing = lister.list(
+        Url::fileURL(directory.path().string()), {}, platform::FolderGrouping::FoldersFirst, [&](Snapshot) {
+            ++calls;
+            listing.reset();
+        });
     dispatch->runUntilIdle();
     EXPECT_EQ(calls, 1);
 }

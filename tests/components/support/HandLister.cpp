@@ -22,9 +22,10 @@ struct HandLister::Listing : platform::FolderListing {
     Update update;
 };
 
-std::shared_ptr<platform::FolderListing> HandLister::list(
-    const Url& folder, std::vector<FolderSnapshot::ExtraItem> extraItems, Update update)
+std::shared_ptr<platform::FolderListing> HandLister::list(const Url& folder,
+    std::vector<FolderSnapshot::ExtraItem> extraItems, platform::FolderGrouping grouping, Update update)
 {
+    _grouping = grouping;
     auto listing = std::make_shared<Listing>(folder, std::move(extraItems), std::move(update));
     _listings.push_back(listing);
     return listing;

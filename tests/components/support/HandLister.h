@@ -20,13 +20,16 @@ public:
     using Entries = std::vector<Entry>;
 
     std::shared_ptr<platform::FolderListing> list(const platform::Url& folder,
-        std::vector<platform::FolderSnapshot::ExtraItem> extraItems, Update update) override;
+        std::vector<platform::FolderSnapshot::ExtraItem> extraItems, platform::FolderGrouping grouping,
+        Update update) override;
 
     /// To the latest listing of a folder, with its extra items first; nothing happens when that has ended.
     void deliver(const platform::Url& folder, const Entries& entries,
         platform::ListingStage stage = platform::ListingStage::Complete) const;
     void fail(const platform::Url& folder, const platform::Error& error) const;
 
+    /// Of the listing that was started last.
+    platform::FolderGrouping grouping() const { return _grouping; }
     std::size_t listingsStarted() const { return _listings.size(); }
 
 private:
@@ -35,6 +38,7 @@ private:
         std::optional<platform::Error> error) const;
 
     std::vector<std::weak_ptr<Listing>> _listings;
+    platform::FolderGrouping _grouping = platform::FolderGrouping::FoldersFirst;
 };
 
 } // namespace testing_support

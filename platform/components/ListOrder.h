@@ -1,0 +1,39 @@
+#pragma once
+
+#include "platform/FolderLister.h"
+#include "platform/FolderSnapshot.h"
+#include "platform/Url.h"
+
+#include <cstdint>
+#include <vector>
+
+namespace platform::components {
+
+enum class OrderKey : std::uint8_t { Name, Date, Size, Kind };
+enum class OrderDirection : std::uint8_t { Ascending, Descending };
+
+/// In which order a folder's list shows its items. A value.
+struct ListOrder {
+    OrderKey key = OrderKey::Name;
+    OrderDirection direction = OrderDirection::Ascending;
+    FolderGrouping grouping = FolderGrouping::FoldersFirst;
+
+    /// Whether it is the order in which the lister delivers the items.
+    bool isListersOwn() const { return key == OrderKey::Name && direction == OrderDirection::Ascending; }
+    /// Whether each item has to be looked at for it.
+    bool needsLooks() const { return key == OrderKey::Date || key == OrderKey::Size; }
+    /// The order for a key that was just chosen: the newest and the largest come first, names from A.
+    ListOrder sortedBy(OrderKey chosen) const;
+    bool operator==(const ListOrder&) const = default;
+};
+
+/// The indexes of a snapshot's entries in an order; equal ones stay in the order of their names. A look at
+/// each item where the order needs it: off the main thread then.
+std::vector<std::uint32_t> orderedIndexes(const FolderSnapshot& snapshot, const ListOrder& order);
+
+/// The order that the user chose for a folder, kept between runs for the folders that were used last; else
+/// the default. Main thread.
+ListOrder savedOrder(const Url& folder);
+void saveOrder(const Url& folder, const ListOrder& order);
+
+} // namespace platform::components
