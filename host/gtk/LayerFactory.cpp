@@ -133,9 +133,8 @@ private:
             makePopover(screen, std::move(content), *anchor);
             return;
         }
-        const bool isSheet =
-            style == ui::PresentationStyle::PageSheet || style == ui::PresentationStyle::Popover;
-        makeOverlay(screen, std::move(content), isSheet && isWide() ? LayerPlace::Sheet : LayerPlace::Cover);
+        const bool fills = style == ui::PresentationStyle::FullScreen || !isWide();
+        makeOverlay(screen, std::move(content), fills ? LayerPlace::Cover : LayerPlace::Sheet);
     }
     void makeOverlay(ui::ViewController& screen, std::unique_ptr<LayerContent> content, LayerPlace place)
     {
