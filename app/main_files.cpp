@@ -4,6 +4,7 @@
 #include "host/system/LocalFileCoordinator.h"
 #include "host/system/MimeTypeRegistry.h"
 #include "host/system/PosixFileSystem.h"
+#include "items/DocumentIdentifiers.h"
 #include "items/FileUtils.h"
 #include "platform/NotificationCenter.h"
 
@@ -44,6 +45,23 @@ int report(const std::optional<platform::Error>& error)
     return error ? 1 : 0;
 }
 
+int printIdentifier(const Url& url)
+{
+    const auto identifier = platform::services().cloudDocumentService().documentIdentifiers().identify(url);
+    if (identifier)
+        std::printf("%u\n", *identifier);
+    return report(identifier.error);
+}
+
+/// Takes an identifier, not a path.
+int printLocation(const std::string& identifier)
+{
+    const auto url = tarrow::trw_URLFromDocumentID(identifier);
+    if (url)
+        std::printf("%s\n", url->path().c_str());
+    return url ? 0 : 1;
+}
+
 /// The exit status; 2 for what is no command.
 int run(std::string_view command, const std::vector<Url>& urls)
 {
@@ -55,6 +73,8 @@ int run(std::string_view command, const std::vector<Url>& urls)
         return report(FileUtils::moveTo(urls[0], urls[1]));
     if (command == "evict" && urls.size() == 1)
         return FileUtils::evictDocument(urls[0]) ? 0 : 1;
+    if (command == "docid" && urls.size() == 1)
+        return printIdentifier(urls[0]);
     return 2;
 }
 
@@ -70,9 +90,12 @@ int main(int argc, char** argv)
     std::vector<Url> urls;
     for (std::size_t i = 2; i < arguments.size(); ++i)
         urls.push_back(Url::fileURL(top + '/' + arguments[i]));
-    const int status = arguments.size() > 1 ? run(arguments[1], urls) : 2;
+    const bool resolves = arguments.size() == 3 && arguments[1] == "resolve";
+    const int status = resolves ? printLocation(arguments[2])
+        : arguments.size() > 1  ? run(arguments[1], urls)
+                                : 2;
     if (status == 2)
-        std::fputs("usage: tarrow-files mkdir|remove|evict PATH | move FROM TO\n", stderr);
+        std::fputs("usage: tarrow-files mkdir|remove|evict|docid PATH | move FROM TO | resolve ID\n", stderr);
     platform::installServices({});
     return status;
 }

@@ -2,10 +2,10 @@
 
 #include "items/FileUtils.h"
 
+#include <cerrno>
 #include <charconv>
 #include <limits>
 #include <system_error>
-#include <utility>
 
 namespace tarrow {
 
@@ -22,13 +22,24 @@ std::optional<std::uint64_t> leadingNumber(std::string_view text)
     return error == std::errc{} ? std::optional(number) : std::nullopt;
 }
 
-std::optional<Url> resolveDocumentID(std::uint64_t identifier)
+using platform::DocumentIdentifiers;
+
+DocumentIdentifiers& documentIdentifiers()
+{
+    return services().cloudDocumentService().documentIdentifiers();
+}
+
+std::string textOf(const Error& error)
+{
+    return std::generic_category().message(error.code());
+}
+
+Result<DocumentIdentifiers::File> resolveDocumentId(std::uint64_t identifier)
 {
     // The file system keeps 32 bits: a longer number must not be taken for the document with its low half.
     if (identifier > std::numeric_limits<std::uint32_t>::max())
-        return std::nullopt;
-    return services().cloudDocumentService().items().documentWithIdentifier(
-        static_cast<std::uint32_t>(identifier));
+        return Error(platform::errorDomain::system, ENOENT);
+    return documentIdentifiers().resolve(static_cast<std::uint32_t>(identifier));
 }
 
 } // namespace
@@ -50,22 +61,31 @@ std::optional<Url> trw_URLFromDocumentID(const std::optional<std::string>& docum
     const auto identifier = leadingNumber(*documentID);
     if (!identifier)
         return std::nullopt;
-    if (!services().cloudDocumentService().containers().defaultContainerURL()) {
+    auto& identifiers = documentIdentifiers();
+    if (!identifiers.deviceIdentifier()) {
         op.error("could not get device ID");
         return std::nullopt;
     }
-    auto url = resolveDocumentID(*identifier);
-    if (!url) {
-        const auto missing = std::make_error_code(std::errc::no_such_file_or_directory);
-        op.error("VXLibraryResolveDocumentId2 failed, errno:%d(%s)", missing.value(), missing.message());
+    const auto file = resolveDocumentId(*identifier);
+    if (!file) {
+        op.error("VXLibraryResolveDocumentId2 failed, errno:%d(%s)", file.error->code(), textOf(*file.error));
         return std::nullopt;
     }
-    const auto found = trw_DocumentID(*url);
-    if (std::cmp_not_equal(found, *identifier)) {
-        op.error("document IDs didn't match (%d v/s %@)", found, *identifier);
+    const auto open = identifiers.open(*file);
+    if (!open) {
+        op.error("openDocument failed, errno:%d(%s)", open.error->code(), textOf(*open.error));
         return std::nullopt;
     }
-    return url;
+    const auto found = (*open)->attributes();
+    if (!found) {
+        op.error("readAttributes failed, error:%d(%s)", found.error->code(), textOf(*found.error));
+        return std::nullopt;
+    }
+    if (found->documentIdentifier != *identifier) {
+        op.error("document IDs didn't match (%d v/s %@)", found->documentIdentifier, *identifier);
+        return std::nullopt;
+    }
+    return found->url;
 }
 
 } // namespace tarrow

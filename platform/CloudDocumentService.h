@@ -3,6 +3,7 @@
 #include "platform/CloudAccount.h"
 #include "platform/CloudItems.h"
 #include "platform/DocumentContainers.h"
+#include "platform/DocumentIdentifiers.h"
 #include "platform/PromisedItems.h"
 #include "platform/SecurityScopedAccess.h"
 
@@ -17,6 +18,7 @@ public:
     virtual PromisedItems& promisedItems() = 0;
     virtual DocumentContainers& containers() = 0;
     virtual CloudItems& items() = 0;
+    virtual DocumentIdentifiers& documentIdentifiers() = 0;
     virtual SecurityScopedAccess& securityScopedAccess() = 0;
 };
 

@@ -46,10 +46,6 @@ public:
     /// any thread, with the URL or the error (damaged, too large, unknown account or document).
     virtual void decodeBookmark(
         const std::string& bookmark, std::function<void(Result<Url>)> completion) const = 0;
-
-    /// The current location of the document with a 32-bit document identifier; nothing when there is none.
-    /// Any thread.
-    virtual std::optional<Url> documentWithIdentifier(std::uint32_t identifier) const = 0;
 };
 
 } // namespace platform

@@ -1,84 +1,176 @@
 #include "host/drive/DocumentIndex.h"
 
-#include "platform/Log.h"
-
 #include <sqlite3.h>
+
+#include <random>
+#include <span>
 
 namespace host::drive {
 
+using Use = IndexDatabase::Use;
+
 namespace {
 
-struct Finalize {
-    void operator()(sqlite3_stmt* statement) const { sqlite3_finalize(statement); }
+/// Documents that are noted in one transaction; others may read and write in between.
+constexpr std::size_t batch = 500;
+
+/// Where the paths below a folder begin and end, in the order of their bytes.
+struct PathsBelow {
+    explicit PathsBelow(const std::string& folder)
+        : first(folder + '/')
+        , end(folder + static_cast<char>('/' + 1))
+    {
+    }
+    std::string first, end;
 };
-using Statement = std::unique_ptr<sqlite3_stmt, Finalize>;
-
-constexpr int patience = 1000; // milliseconds to wait for another process that writes
-
-Statement prepare(sqlite3* database, const char* text)
-{
-    sqlite3_stmt* statement = nullptr;
-    sqlite3_prepare_v2(database, text, -1, &statement, nullptr);
-    return Statement(statement);
-}
 
 } // namespace
 
-void DocumentIndex::Close::operator()(sqlite3* database) const
+bool DocumentIndex::isReadyFor(Use use) const
 {
-    sqlite3_close(database);
+    const auto state = _database.prepareFor(use);
+    return state == State::Incomplete || state == State::Complete;
 }
 
-sqlite3* DocumentIndex::open(int flags) const
-{
-    sqlite3* opened = nullptr;
-    const int failure = sqlite3_open_v2(_path.c_str(), &opened, flags, nullptr);
-    _database.reset(opened);
-    if (failure != SQLITE_OK) {
-        _database.reset();
-        return nullptr;
-    }
-    sqlite3_busy_timeout(opened, patience);
-    return opened;
-}
-
-std::optional<std::string> DocumentIndex::pathOf(std::uint32_t identifier) const
-{
-    static constexpr platform::Operation op{"-[DocumentIndex pathOf:]"};
-    const std::lock_guard lock(_mutex);
-    sqlite3* database = _database ? _database.get() : open(SQLITE_OPEN_READONLY);
-    if (!database)
-        return std::nullopt;
-    const auto query = prepare(database, "SELECT path FROM documents WHERE identifier = ?");
-    if (!query) {
-        op.error("Cannot read the index %@: %@", _path, std::string(sqlite3_errmsg(database)));
-        _database.reset();
-        return std::nullopt;
-    }
-    sqlite3_bind_int64(query.get(), 1, identifier);
-    if (sqlite3_step(query.get()) != SQLITE_ROW)
-        return std::nullopt;
-    const void* path = sqlite3_column_blob(query.get(), 0);
-    const auto length = static_cast<std::size_t>(sqlite3_column_bytes(query.get(), 0));
-    return path ? std::optional(std::string(static_cast<const char*>(path), length)) : std::nullopt;
-}
-
-bool DocumentIndex::note(std::uint32_t identifier, const std::string& path)
+DocumentIndex::State DocumentIndex::state() const
 {
     const std::lock_guard lock(_mutex);
-    sqlite3* database = open(SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE);
-    if (!database)
-        return false;
-    sqlite3_exec(database,
-        "CREATE TABLE IF NOT EXISTS documents (identifier INTEGER PRIMARY KEY, path BLOB NOT NULL)", nullptr,
-        nullptr, nullptr);
-    const auto insert = prepare(database, "INSERT OR REPLACE INTO documents VALUES (?, ?)");
-    if (!insert)
-        return false;
-    sqlite3_bind_int64(insert.get(), 1, identifier);
-    // Names are bytes, not necessarily text.
-    sqlite3_bind_blob(insert.get(), 2, path.data(), static_cast<int>(path.size()), SQLITE_STATIC);
-    return sqlite3_step(insert.get()) == SQLITE_DONE;
+    return _database.prepareFor(Use::Reading);
+}
+
+DocumentIndex::Answer DocumentIndex::lookUp(std::uint32_t identifier) const
+{
+    const std::lock_guard lock(_mutex);
+    const auto state = _database.prepareFor(Use::Reading);
+    if (state == State::Missing)
+        return {Answer::Kind::Unknown, {}};
+    if (state != State::Incomplete && state != State::Complete)
+        return {};
+    auto query = _database.query("SELECT path, device, inode FROM documents WHERE identifier = ?");
+    const int code = query.bind(1, identifier).step();
+    if (code == SQLITE_DONE)
+        return {Answer::Kind::Unknown, {}};
+    if (code != SQLITE_ROW) {
+        _database.judge(code);
+        return {};
+    }
+    if (query.isNull(0))
+        return {Answer::Kind::Removed, {}};
+    return {Answer::Kind::Known,
+        {query.bytes(0), static_cast<std::uint64_t>(query.number(1)),
+            static_cast<std::uint64_t>(query.number(2))}};
+}
+
+std::vector<IdentifiedPlace> DocumentIndex::documentsWithin(const std::string& path) const
+{
+    const std::lock_guard lock(_mutex);
+    if (!isReadyFor(Use::Reading))
+        return {};
+    const PathsBelow below(path);
+    auto query = _database.query("SELECT identifier, path, device, inode FROM documents"
+                                 " WHERE path = ?1 OR (path >= ?2 AND path < ?3)");
+    query.bind(1, path).bind(2, below.first).bind(3, below.end);
+    std::vector<IdentifiedPlace> found;
+    int code = query.step();
+    for (; code == SQLITE_ROW; code = query.step())
+        found.push_back({static_cast<std::uint32_t>(query.number(0)),
+            {query.bytes(1), static_cast<std::uint64_t>(query.number(2)),
+                static_cast<std::uint64_t>(query.number(3))}});
+    _database.judge(code);
+    return found;
+}
+
+bool DocumentIndex::note(std::uint32_t identifier, const DocumentPlace& place)
+{
+    const std::lock_guard lock(_mutex);
+    return isReadyFor(Use::Writing) && write(identifier, place);
+}
+
+bool DocumentIndex::write(std::uint32_t identifier, const DocumentPlace& place)
+{
+    auto query = _database.query("INSERT INTO documents VALUES (?1, ?2, ?3, ?4) ON CONFLICT (identifier)"
+                                 " DO UPDATE SET path = ?2, device = ?3, inode = ?4 WHERE path IS NOT NULL");
+    query.bind(1, identifier).bind(2, place.path);
+    query.bind(3, static_cast<std::int64_t>(place.device)).bind(4, static_cast<std::int64_t>(place.inode));
+    const int code = query.step();
+    _database.judge(code);
+    return code == SQLITE_DONE;
+}
+
+std::optional<std::uint32_t> DocumentIndex::reserve(const DocumentPlace& place)
+{
+    const std::lock_guard lock(_mutex);
+    if (!isReadyFor(Use::Writing))
+        return std::nullopt;
+    // By chance rather than in turn: should the index be lost, what it had given is still hardly given again.
+    std::random_device random;
+    std::uniform_int_distribution<std::uint32_t> anyIdentifier(1);
+    for (int tries = 0; tries < 32; ++tries) {
+        const auto identifier = anyIdentifier(random);
+        auto query = _database.query("INSERT INTO documents VALUES (?1, ?2, ?3, ?4) ON CONFLICT DO NOTHING");
+        query.bind(1, identifier).bind(2, place.path);
+        query.bind(3, static_cast<std::int64_t>(place.device));
+        query.bind(4, static_cast<std::int64_t>(place.inode));
+        if (const int code = query.step(); code != SQLITE_DONE) {
+            _database.judge(code);
+            return std::nullopt;
+        }
+        if (_database.changes() == 1)
+            return identifier;
+    }
+    return std::nullopt;
+}
+
+void DocumentIndex::release(std::uint32_t identifier)
+{
+    const std::lock_guard lock(_mutex);
+    if (isReadyFor(Use::Writing))
+        _database.judge(
+            _database.query("DELETE FROM documents WHERE identifier = ?").bind(1, identifier).step());
+}
+
+void DocumentIndex::noteMove(const std::string& from, const std::string& to)
+{
+    const std::lock_guard lock(_mutex);
+    if (!isReadyFor(Use::Writing))
+        return;
+    const PathsBelow below(from);
+    auto query = _database.query("UPDATE documents SET path = CAST(?4 || substr(path, ?5) AS BLOB)"
+                                 " WHERE path = ?1 OR (path >= ?2 AND path < ?3)");
+    query.bind(1, from).bind(2, below.first).bind(3, below.end);
+    query.bind(4, to).bind(5, static_cast<std::int64_t>(from.size()) + 1);
+    _database.judge(query.step());
+}
+
+void DocumentIndex::noteRemoval(std::uint32_t identifier)
+{
+    const std::lock_guard lock(_mutex);
+    if (isReadyFor(Use::Writing))
+        _database.judge(_database.query("UPDATE documents SET path = NULL, inode = 0 WHERE identifier = ?")
+                            .bind(1, identifier)
+                            .step());
+}
+
+bool DocumentIndex::complete(const std::vector<IdentifiedPlace>& all)
+{
+    for (std::span<const IdentifiedPlace> rest(all); !rest.empty();
+         rest = rest.subspan(std::min(batch, rest.size()))) {
+        const std::lock_guard lock(_mutex);
+        if (!isReadyFor(Use::Writing) || !_database.run("BEGIN IMMEDIATE"))
+            return false;
+        for (const auto& document : rest.first(std::min(batch, rest.size()))) {
+            if (!write(document.identifier, document.place)) {
+                _database.run("ROLLBACK");
+                return false;
+            }
+        }
+        if (!_database.run("COMMIT")) {
+            _database.run("ROLLBACK");
+            return false;
+        }
+    }
+    const std::lock_guard lock(_mutex);
+    return isReadyFor(Use::Writing) && _database.setComplete() == State::Complete;
 }
 
 } // namespace host::drive

@@ -1,39 +1,76 @@
 #pragma once
 
+#include "host/drive/IndexDatabase.h"
+
 #include <cstdint>
-#include <memory>
 #include <mutex>
 #include <optional>
 #include <string>
-
-struct sqlite3;
+#include <vector>
 
 namespace host::drive {
 
+/// Where a document was last seen.
+struct DocumentPlace {
+    std::string path; ///< the item's, below the drive's home
+    std::uint64_t device = 0, inode = 0; ///< of the item or of its promise; 0: not known
+    bool operator==(const DocumentPlace&) const = default;
+};
+
+struct IdentifiedPlace {
+    std::uint32_t identifier = 0;
+    DocumentPlace place;
+    bool operator==(const IdentifiedPlace&) const = default;
+};
+
 /// Where documents with an identifier were last seen. It is a hint only: who asks must look whether the
-/// document still carries the identifier. Any thread.
+/// document still carries the identifier. What cannot be written is left out; a damaged index is begun anew
+/// by the next change. Any thread; several processes use it at once.
 class DocumentIndex {
 public:
+    using State = IndexDatabase::State;
+
     /// Nothing is opened before it is needed.
     explicit DocumentIndex(std::string path)
-        : _path(std::move(path))
+        : _database(std::move(path))
     {
     }
 
-    /// The path below the drive's home; nothing when the index has none, is missing or cannot be read.
-    std::optional<std::string> pathOf(std::uint32_t identifier) const;
-    /// Notes where a document is, making the index when there is none; whether it was noted.
-    bool note(std::uint32_t identifier, const std::string& path);
+    struct Answer {
+        enum class Kind : std::uint8_t {
+            Known,
+            Unknown, ///< it is not in the index
+            Removed, ///< the document was removed; its identifier is never given again
+            Unreadable, ///< the index cannot be asked
+        };
+        Kind kind = Kind::Unreadable;
+        DocumentPlace place; ///< of a known one
+    };
+    Answer lookUp(std::uint32_t identifier) const;
+    /// All documents at a path and below it.
+    std::vector<IdentifiedPlace> documentsWithin(const std::string& path) const;
+    State state() const;
+
+    /// Notes where a document is, making the index when there is none; whether it was noted. One that was
+    /// removed stays so.
+    bool note(std::uint32_t identifier, const DocumentPlace& place);
+    /// An identifier that the index does not know, noted for a place; nothing when it cannot be written.
+    std::optional<std::uint32_t> reserve(const DocumentPlace& place);
+    /// Gives a reserved identifier back.
+    void release(std::uint32_t identifier);
+    /// An item and everything below it lies elsewhere now.
+    void noteMove(const std::string& from, const std::string& to);
+    void noteRemoval(std::uint32_t identifier);
+    /// Notes everything that the drive holds; from then on the index is complete. Whether it could be
+    /// written.
+    bool complete(const std::vector<IdentifiedPlace>& all);
 
 private:
-    struct Close {
-        void operator()(sqlite3* database) const;
-    };
-    sqlite3* open(int flags) const;
+    bool write(std::uint32_t identifier, const DocumentPlace& place);
+    bool isReadyFor(IndexDatabase::Use use) const;
 
-    std::string _path;
     mutable std::mutex _mutex;
-    mutable std::unique_ptr<sqlite3, Close> _database;
+    mutable IndexDatabase _database;
 };
 
 } // namespace host::drive

@@ -34,7 +34,10 @@ public:
     /// Items that are being removed, each under a private name.
     std::string held() const { return _home + "/held"; }
     /// Where the processes that use the drive exclude each other; its content is never read.
-    std::string coordination() const { return _home + "/locks/coordination"; }
+    std::string coordination() const { return locks() + "/coordination"; }
+    /// Whoever gives a document identifier holds this file locked; its content is never read.
+    std::string identification() const { return locks() + "/identifiers"; }
+    std::string locks() const { return _home + "/locks"; }
     /// What the application keeps between runs: defaults and saved interface state.
     const std::string& state() const { return _state; }
     std::string defaults() const { return _state + "/defaults.json"; }

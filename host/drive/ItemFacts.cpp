@@ -212,6 +212,13 @@ std::uint32_t documentIdentifierOf(const host::system::FileDescriptor& item)
     return length > 0 ? identifier({value.data(), static_cast<std::size_t>(length)}) : 0;
 }
 
+std::uint32_t documentIdentifierAt(const std::string& path)
+{
+    std::array<char, 32> value;
+    const auto length = ::lgetxattr(path.c_str(), itemMark::documentIdentifier, value.data(), value.size());
+    return length > 0 ? identifier({value.data(), static_cast<std::size_t>(length)}) : 0;
+}
+
 std::optional<bool> existsOnDisk(const std::string& path)
 {
     struct statx found;

@@ -61,6 +61,8 @@ ItemFacts lookAtFile(const std::string& path);
 
 /// The document identifier that an open item carries; 0 for none. A descriptor opened with O_PATH will do.
 std::uint32_t documentIdentifierOf(const host::system::FileDescriptor& item);
+/// The same of what lies at a path, the last link not followed.
+std::uint32_t documentIdentifierAt(const std::string& path);
 
 /// Whether anything is at a path, links not followed; nothing when it cannot be told.
 std::optional<bool> existsOnDisk(const std::string& path);

@@ -17,13 +17,14 @@ LocalCloudDocumentService::LocalCloudDocumentService(
     : _layout(layout)
     , _account(layout)
     , _store(std::make_shared<LocalCloudStore>(layout))
-    , _itemChanges(std::make_shared<LocalItemChanges>(layout, _store))
+    , _identifiers(LocalDocumentIdentifiers::create(layout, dependencies.dispatch))
+    , _itemChanges(std::make_shared<IndexedItemChanges>(layout, _store, _identifiers))
     , _containers(std::make_shared<LocalContainers>(layout, settings.languages, _itemChanges))
     , _promisedItems(layout,
           ItemAttributes(dependencies.typeRegistry, _containers, dependencies.localization,
               layout.defaultContainerURL()),
-          ThumbnailCache::create(settings.thumbnailFolder, dependencies.dispatch))
-    , _items(layout, _itemChanges, _store, dependencies.dispatch)
+          ThumbnailCache::create(settings.thumbnailFolder, dependencies.dispatch), _identifiers)
+    , _items(layout, _itemChanges, _identifiers, _store, dependencies.dispatch)
     , _storageOffers(LocalStorageOfferManager::create(layout, dependencies))
     , _keyValueStore(LocalKeyValueStore::create(layout, dependencies))
     , _monitor(AccountMonitor::start(layout, dependencies))

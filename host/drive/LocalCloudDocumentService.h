@@ -5,7 +5,6 @@
 #include "host/drive/LocalAccount.h"
 #include "host/drive/LocalCloudItems.h"
 #include "host/drive/LocalContainers.h"
-#include "host/drive/LocalItemChanges.h"
 #include "host/drive/LocalKeyValueStore.h"
 #include "host/drive/LocalPromisedItems.h"
 #include "host/drive/LocalStorageOfferManager.h"
@@ -29,7 +28,7 @@ public:
 
     const DriveLayout& layout() const { return _layout; }
     /// What changes the drive's items; for the file system that is installed beside this service.
-    std::shared_ptr<LocalItemChanges> itemChanges() const { return _itemChanges; }
+    std::shared_ptr<IndexedItemChanges> itemChanges() const { return _itemChanges; }
     /// The account's storage offer; it follows the same file.
     const std::shared_ptr<LocalStorageOfferManager>& storageOffers() const { return _storageOffers; }
     /// The values that the account's devices share.
@@ -39,6 +38,7 @@ public:
     platform::PromisedItems& promisedItems() override { return _promisedItems; }
     platform::DocumentContainers& containers() override { return *_containers; }
     platform::CloudItems& items() override { return _items; }
+    platform::DocumentIdentifiers& documentIdentifiers() override { return *_identifiers; }
     platform::SecurityScopedAccess& securityScopedAccess() override { return *this; }
 
     // Everything of the local store may be used by its user at any time: no leave is needed.
@@ -52,7 +52,8 @@ private:
     DriveLayout _layout;
     LocalAccount _account;
     std::shared_ptr<CloudStore> _store;
-    std::shared_ptr<LocalItemChanges> _itemChanges;
+    std::shared_ptr<LocalDocumentIdentifiers> _identifiers;
+    std::shared_ptr<IndexedItemChanges> _itemChanges;
     std::shared_ptr<LocalContainers> _containers;
     LocalPromisedItems _promisedItems;
     LocalCloudItems _items;

@@ -6,7 +6,6 @@
 #include "host/drive/BookmarkMaking.h"
 #include "host/drive/ItemFacts.h"
 #include "host/drive/LinkRecords.h"
-#include "host/drive/LocalItemChanges.h"
 #include "host/drive/RealPath.h"
 #include "host/drive/SmallFile.h"
 
@@ -24,20 +23,6 @@ bool isWithin(const Url& url, const std::string& folder)
 {
     const auto real = url.isFileURL() ? realPathOfEntry(url.path()) : std::nullopt;
     return real && Url::fileURL(*real).isWithin(Url::fileURL(folder));
-}
-
-// The identifier that the item at a path below the drive's home carries, here or promised; 0 for none. The
-// item is held open while it is asked, so that the answer is about one item and no other.
-std::uint32_t identifierAt(const DriveLayout& layout, const std::string& relativePath)
-{
-    if (const auto item = openBeneath(layout.home(), relativePath, O_PATH))
-        return documentIdentifierOf(item);
-    const auto path = PromiseRecord::pathFor(relativePath);
-    const auto file = openBeneath(layout.home(), path, O_RDONLY | O_NONBLOCK);
-    const auto text =
-        file ? readSmallFile(file, path, PromiseRecord::maximumFileSize) : Result<std::string>();
-    const auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
-    return promise ? promise->documentIdentifier : 0;
 }
 
 Error unusableBookmark(const char* sentence)
@@ -59,16 +44,8 @@ std::optional<Url> documentAtPlace(const DriveLayout& layout, const Bookmark& bo
     return Url::fileURL(path);
 }
 
-std::optional<Url> findDocument(
-    const DriveLayout& layout, const DocumentIndex& index, std::uint32_t identifier)
-{
-    const auto path = identifier == 0 ? std::nullopt : index.pathOf(identifier);
-    if (!path || !isPlainRelativePath(*path) || identifierAt(layout, *path) != identifier)
-        return std::nullopt;
-    return Url::fileURL(layout.home() + '/' + *path);
-}
-
-Result<Url> findBookmarked(const DriveLayout& layout, const DocumentIndex& index, const std::string& text)
+Result<Url> findBookmarked(
+    const DriveLayout& layout, LocalDocumentIdentifiers& identifiers, const std::string& text)
 {
     const auto bookmark = Bookmark::decode(text);
     if (!bookmark)
@@ -77,7 +54,7 @@ Result<Url> findBookmarked(const DriveLayout& layout, const DocumentIndex& index
     if (!account || account->identity != bookmark->account)
         return unusableBookmark("The link leads to a document of another account.");
     // The identifier stays with the document when it is moved, so it counts before the place.
-    auto found = findDocument(layout, index, bookmark->documentIdentifier);
+    auto found = identifiers.find(bookmark->documentIdentifier);
     if (!found)
         found = documentAtPlace(layout, *bookmark);
     if (!found)
@@ -90,15 +67,16 @@ Result<Url> findBookmarked(const DriveLayout& layout, const DocumentIndex& index
 
 } // namespace
 
-LocalCloudItems::LocalCloudItems(DriveLayout layout, std::shared_ptr<LocalItemChanges> changes,
-    std::shared_ptr<CloudStore> store, const std::shared_ptr<platform::Dispatch>& dispatch)
+LocalCloudItems::LocalCloudItems(DriveLayout layout, std::shared_ptr<IndexedItemChanges> changes,
+    std::shared_ptr<LocalDocumentIdentifiers> identifiers, std::shared_ptr<CloudStore> store,
+    const std::shared_ptr<platform::Dispatch>& dispatch)
     : _layout(std::move(layout))
     , _changes(std::move(changes))
+    , _identifiers(std::move(identifiers))
     , _downloads{_layout, std::move(store),
           dispatch->makeOperationQueue(
               "TarrowDriveAppID.downloads", platform::QualityOfService::UserInitiated),
           dispatch->mainQueue()}
-    , _index(std::make_shared<DocumentIndex>(_layout.index()))
     , _queue(dispatch->makeSerialQueue("TarrowDriveAppID.bookmarks"))
 {
 }
@@ -127,29 +105,33 @@ std::optional<Error> LocalCloudItems::evictItem(const Url& url)
 std::unique_ptr<platform::ItemDownload> LocalCloudItems::startDownload(
     const Url& url, platform::DownloadHandlers handlers)
 {
+    handlers.completion = [identifiers = _identifiers, path = url.path(),
+                              completion = std::move(handlers.completion)](const auto& error) {
+        if (!error)
+            identifiers->replaced(path);
+        if (completion)
+            completion(error);
+    };
     return LocalDownload::start(_downloads, url.path(), std::move(handlers));
-}
-
-std::optional<Url> LocalCloudItems::documentWithIdentifier(std::uint32_t identifier) const
-{
-    return findDocument(_layout, *_index, identifier);
 }
 
 void LocalCloudItems::RZBookmarkableStringFromDocumentURL(
     const Url& url, std::function<void(Result<std::string>)> completion) const
 {
-    _queue->async([layout = _layout, url, completion = std::move(completion)] {
-        completion(makeBookmark(
-            layout, url, [&layout](const std::string& path) { return identifierAt(layout, path); }));
+    _queue->async([layout = _layout, identifiers = _identifiers, url, completion = std::move(completion)] {
+        completion(makeBookmark(layout, url, [&identifiers](const std::string& path) {
+            return identifiers->identifyAt(path).value.value_or(0);
+        }));
     });
 }
 
 void LocalCloudItems::decodeBookmark(
     const std::string& bookmark, std::function<void(Result<Url>)> completion) const
 {
-    _queue->async([layout = _layout, index = _index, bookmark, completion = std::move(completion)] {
-        completion(findBookmarked(layout, *index, bookmark));
-    });
+    _queue->async(
+        [layout = _layout, identifiers = _identifiers, bookmark, completion = std::move(completion)] {
+            completion(findBookmarked(layout, *identifiers, bookmark));
+        });
 }
 
 } // namespace host::drive

@@ -1,7 +1,6 @@
 #pragma once
 
-#include "host/drive/DocumentIndex.h"
-#include "host/drive/DriveLayout.h"
+#include "host/drive/IndexedItemChanges.h"
 #include "host/drive/LocalDownload.h"
 #include "platform/CloudItems.h"
 #include "platform/Dispatch.h"
@@ -9,13 +8,13 @@
 namespace host::drive {
 
 struct Bookmark;
-class LocalItemChanges;
 
 /// Where items of the local store lie.
 class LocalCloudItems : public platform::CloudItems {
 public:
-    LocalCloudItems(DriveLayout layout, std::shared_ptr<LocalItemChanges> changes,
-        std::shared_ptr<CloudStore> store, const std::shared_ptr<platform::Dispatch>& dispatch);
+    LocalCloudItems(DriveLayout layout, std::shared_ptr<IndexedItemChanges> changes,
+        std::shared_ptr<LocalDocumentIdentifiers> identifiers, std::shared_ptr<CloudStore> store,
+        const std::shared_ptr<platform::Dispatch>& dispatch);
 
     bool isInDocumentsArea(const platform::Url& url) const override;
     bool isInTrash(const platform::Url& url) const override;
@@ -27,13 +26,12 @@ public:
         const platform::Url& url, platform::DownloadHandlers handlers) override;
     void decodeBookmark(const std::string& bookmark,
         std::function<void(platform::Result<platform::Url>)> completion) const override;
-    std::optional<platform::Url> documentWithIdentifier(std::uint32_t identifier) const override;
 
 private:
     DriveLayout _layout;
-    std::shared_ptr<LocalItemChanges> _changes;
+    std::shared_ptr<IndexedItemChanges> _changes;
+    std::shared_ptr<LocalDocumentIdentifiers> _identifiers;
     LocalDownload::Setting _downloads;
-    std::shared_ptr<DocumentIndex> _index;
     std::shared_ptr<platform::Queue> _queue;
 };
 

@@ -1,6 +1,7 @@
 #include "host/drive/LocalPromisedItems.h"
 
 #include "host/drive/LinkRecords.h"
+#include "host/drive/LocalDocumentIdentifiers.h"
 #include "host/drive/SmallFile.h"
 #include "host/drive/ThumbnailCache.h"
 
@@ -26,11 +27,12 @@ bool isReferenceName(const Url& url)
 
 } // namespace
 
-LocalPromisedItems::LocalPromisedItems(
-    DriveLayout layout, ItemAttributes attributes, std::shared_ptr<ThumbnailCache> thumbnails)
+LocalPromisedItems::LocalPromisedItems(DriveLayout layout, ItemAttributes attributes,
+    std::shared_ptr<ThumbnailCache> thumbnails, std::shared_ptr<LocalDocumentIdentifiers> identifiers)
     : _layout(std::move(layout))
     , _attributes(std::move(attributes))
     , _thumbnails(std::move(thumbnails))
+    , _identifiers(std::move(identifiers))
 {
 }
 
@@ -60,6 +62,10 @@ platform::ItemReading LocalPromisedItems::readItem(const Url& url, platform::Att
         return reading;
     }
     fill(reading.values.value.emplace(), url, facts, keys);
+    // Rows are read again when their folder changes: what others moved is noticed here.
+    if (const auto identifier =
+            isPromised ? facts.promise.documentIdentifier : facts.marks.documentIdentifier)
+        _identifiers->seen(identifier, url.path());
     reading.tagNames = isPromised ? facts.promise.tags : facts.marks.tags;
     return reading;
 }

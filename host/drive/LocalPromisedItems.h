@@ -8,6 +8,7 @@
 
 namespace host::drive {
 
+class LocalDocumentIdentifiers;
 class ThumbnailCache;
 
 /// Items of the local store: real files, and hidden promise files beside where the item would be. Where both
@@ -15,8 +16,8 @@ class ThumbnailCache;
 /// paths.
 class LocalPromisedItems : public platform::PromisedItems {
 public:
-    LocalPromisedItems(
-        DriveLayout layout, ItemAttributes attributes, std::shared_ptr<ThumbnailCache> thumbnails);
+    LocalPromisedItems(DriveLayout layout, ItemAttributes attributes,
+        std::shared_ptr<ThumbnailCache> thumbnails, std::shared_ptr<LocalDocumentIdentifiers> identifiers);
 
     std::optional<platform::Error> checkPromisedItemIsReachable(const platform::Url& url) const override;
     platform::Result<platform::AttributeMap> promisedItemResourceValues(
@@ -41,6 +42,7 @@ private:
     DriveLayout _layout;
     ItemAttributes _attributes;
     std::shared_ptr<ThumbnailCache> _thumbnails;
+    std::shared_ptr<LocalDocumentIdentifiers> _identifiers;
 };
 
 } // namespace host::drive

@@ -71,7 +71,7 @@ protected:
         drive.mark(url(relativePath), host::drive::itemMark::documentIdentifier, identifier);
         host::drive::DocumentIndex(drive.layout().index())
             .note(static_cast<std::uint32_t>(std::stoul(identifier)),
-                "documents/BrindleDefault/" + relativePath);
+                {"documents/BrindleDefault/" + relativePath});
     }
     static PropertyValue archived(const PropertyValue& value)
     {

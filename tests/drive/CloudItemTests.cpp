@@ -36,7 +36,7 @@ protected:
     void note(std::uint32_t identifier, const std::string& relativePath)
     {
         host::drive::DocumentIndex index(_drive.layout().index());
-        ASSERT_TRUE(index.note(identifier, "documents/BrindleDefault/" + relativePath));
+        ASSERT_TRUE(index.note(identifier, {"documents/BrindleDefault/" + relativePath}));
     }
 
     DriveFixture _drive;
@@ -110,36 +110,6 @@ TEST_F(CloudItemTests, realLocations)
     for (const auto& [from, to] : rows)
         EXPECT_EQ(items().realURL(from), to) << from.path();
     EXPECT_TRUE(items().realURL(document).isSameObject(document));
-}
-
-TEST_F(CloudItemTests, aDocumentIsFoundByItsIdentifierOnlyWhileItCarriesIt)
-{
-    EXPECT_FALSE(items().documentWithIdentifier(7)) << "no index yet";
-    const auto document = identified("Documents/a.txt", "7");
-    note(7, "Documents/a.txt");
-    EXPECT_EQ(items().documentWithIdentifier(7), document);
-
-    _drive.mark(document, host::drive::itemMark::documentIdentifier, "8");
-    EXPECT_FALSE(items().documentWithIdentifier(7)) << "another document took its place";
-
-    host::drive::PromiseRecord promise;
-    promise.documentIdentifier = 9;
-    const auto promised = _drive.writePromise("Documents/b.txt", promise);
-    note(9, "Documents/b.txt");
-    EXPECT_EQ(items().documentWithIdentifier(9), promised);
-
-    const auto outside = _drive.folder().write("outside/a.txt", "");
-    _drive.mark(Url::fileURL(outside), host::drive::itemMark::documentIdentifier, "10");
-    _drive.writeLink("outer", _drive.folder().at("outside"));
-    _drive.writeLink("outer.txt", outside);
-    for (const char* path : {"outer/a.txt", "outer.txt", "../../../outside/a.txt"}) {
-        note(10, path);
-        EXPECT_FALSE(items().documentWithIdentifier(10)) << path;
-    }
-    EXPECT_FALSE(items().documentWithIdentifier(0));
-    std::ofstream(_drive.layout().index(), std::ios::trunc)
-        << "this is no database, and it is longer than a page header of one";
-    EXPECT_FALSE(items().documentWithIdentifier(9));
 }
 
 TEST_F(CloudItemTests, bookmarksLeadToTheirDocument)
@@ -243,6 +213,7 @@ TEST_F(BookmarkMaking, namesADocumentForOtherDevices)
         identified("Documents/Süß & salzig.txt", "7"),
         _drive.writePromise("Documents/promised.txt", promise),
         Url::fileURL(_drive.layout().containerDocuments("app.example.Notes") + "/note.txt"),
+        _drive.writeDocument("Documents/\xff.txt"),
     };
     std::ofstream(rows[3].path()) << "note";
     for (const auto& document : rows) {
@@ -274,7 +245,6 @@ TEST_F(BookmarkMaking, refusesWhatNoOtherDeviceCanOpen)
         _drive.layout().documentsURL(),
         _drive.layout().defaultContainerURL(),
         Url::fileURL(container + "/settings.json"),
-        _drive.writeDocument("Documents/\xff.txt"),
         _drive.writeDocument(deep + "/a.txt"),
         *Url::parse("https://example.org/a.txt"),
     };

@@ -1,4 +1,5 @@
 #include "items/DocumentIdentifiers.h"
+#include "items/FileUtils.h"
 #include "items/UrlResolution.h"
 #include "tests/items/support/ItemsFixture.h"
 
@@ -72,11 +73,10 @@ TEST_F(UrlResolutionTest, OffersOtherContainersOnlyWhereTheFirstItemMayGo)
 
 class DocumentIdentifierTest : public ItemsFixture {
 protected:
-    /// Gives a document the identifier 4711 and notes that it lies at a path of the drive.
-    void identify(const Url& url, const std::string& path) const
+    /// The identifier of a document, as text.
+    std::string identify(const Url& url) const
     {
-        mark(url, host::drive::itemMark::documentIdentifier, "4711");
-        host::drive::DocumentIndex(layout().index()).note(4711, "documents/BrindleDefault/" + path);
+        return std::to_string(DriveFixture::cloud->documentIdentifiers().identify(url).value.value_or(0));
     }
 };
 
@@ -93,42 +93,73 @@ TEST_F(DocumentIdentifierTest, AnswersNothingForWhatIsNoIdentifier)
 TEST_F(DocumentIdentifierTest, FollowsADocumentThatMoves)
 {
     const auto url = writeDocument("a.txt", "1");
-    identify(url, "a.txt");
-    EXPECT_EQ(trw_DocumentID(url), 4711);
-    EXPECT_EQ(trw_DocumentID(writeDocument("b.txt", "1")), 0);
-    EXPECT_EQ(trw_URLFromDocumentID("4711"), url);
-    EXPECT_EQ(trw_URLFromDocumentID(" \t4711 and more"), url);
+    EXPECT_EQ(trw_DocumentID(url), 0) << "it is read, not given";
+    const auto identifier = identify(url);
+    EXPECT_EQ(std::to_string(trw_DocumentID(url)), identifier);
+    EXPECT_EQ(trw_URLFromDocumentID(identifier), url);
+    EXPECT_EQ(trw_URLFromDocumentID(" \t" + identifier + " and more"), url);
 
     makeFolder("Notes");
-    std::filesystem::rename(url.path(), at("Notes/renamed.txt").path());
+    ASSERT_EQ(FileUtils::moveTo(url, at("Notes/renamed.txt")), std::nullopt);
     writeDocument("a.txt", "another");
-    EXPECT_EQ(trw_URLFromDocumentID("4711"), std::nullopt);
-    identify(at("Notes/renamed.txt"), "Notes/renamed.txt");
-    EXPECT_EQ(trw_URLFromDocumentID("4711"), at("Notes/renamed.txt"));
+    EXPECT_EQ(trw_URLFromDocumentID(identifier), at("Notes/renamed.txt"));
+    EXPECT_EQ(log->count("ERROR"), 0U);
+    ASSERT_TRUE(FileUtils::evictDocument(at("Notes/renamed.txt")));
+    EXPECT_EQ(trw_URLFromDocumentID(identifier), at("Notes/renamed.txt"));
+    EXPECT_EQ(std::to_string(trw_DocumentID(at("Notes/renamed.txt"))), identifier);
+    ASSERT_EQ(FileUtils::remove(at("Notes/renamed.txt")), std::nullopt);
+    EXPECT_EQ(trw_URLFromDocumentID(identifier), std::nullopt);
 }
 
 TEST_F(DocumentIdentifierTest, FindsNothingWhileSignedOut)
 {
-    identify(writeDocument("a.txt", "1"), "a.txt");
+    const auto identifier = identify(writeDocument("a.txt", "1"));
     signOut();
-    EXPECT_EQ(trw_URLFromDocumentID("4711"), std::nullopt);
+    EXPECT_EQ(trw_URLFromDocumentID(identifier), std::nullopt);
     EXPECT_EQ(log->count("ERROR could not get device ID"), 1U);
+    signIn("Mira");
+    EXPECT_EQ(trw_URLFromDocumentID(identifier), at("a.txt")) << "the look at the device is taken again";
 }
 
-TEST_F(DocumentIdentifierTest, RefusesADocumentThatSaysItIsAnother)
+TEST_F(DocumentIdentifierTest, SaysWhichStepFailed)
 {
-    identify(writeDocument("a.txt", "1"), "a.txt");
-    changeValues([](const Url&, AttributeMap& values) {
-        values.set(AttributeKey::DocumentIdentifier, std::uint64_t{12});
-    });
-    EXPECT_EQ(trw_URLFromDocumentID("4711"), std::nullopt);
-    EXPECT_EQ(log->count("ERROR document IDs didn't match (12 v/s 4711)"), 1U);
+    auto& hooks = decorated->decoratedIdentifiers;
+    const auto remove = [&] { std::filesystem::remove(at("a.txt").path()); };
+    const struct {
+        std::function<void()> beforeLooking, beforeOpening, beforeReading;
+        std::string message;
+    } rows[] = {
+        {remove, {}, {}, "VXLibraryResolveDocumentId2 failed, errno:2(No such file or directory)"},
+        {{}, remove, {}, "openDocument failed, errno:2(No such file or directory)"},
+        {{}, [&] { remove(), writeLink("a.txt", "/etc/hostname"); }, {}, "openDocument failed, errno:40(Too many levels of symbolic links)"},
+        {{}, {}, remove, "readAttributes failed, error:2(No such file or directory)"},
+        {{}, {}, [&] { std::filesystem::rename(at("a.txt").path(), layout().home() + "/out"); },
+            "readAttributes failed, error:18(Invalid cross-device link)"},
+        {{}, {}, [&] { mark(at("a.txt"), host::drive::itemMark::documentIdentifier, "12"); },
+            "document IDs didn't match (12 v/s "},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.message);
+        hooks.beforeOpening = hooks.beforeReading = nullptr;
+        const auto identifier = identify(writeDocument("a.txt", "1"));
+        log->clear();
+        if (row.beforeLooking)
+            row.beforeLooking();
+        hooks.beforeOpening = row.beforeOpening;
+        hooks.beforeReading = row.beforeReading;
+        EXPECT_EQ(trw_URLFromDocumentID(identifier), std::nullopt);
+        EXPECT_THAT(log->lines(), testing::ElementsAre(testing::StartsWith("ERROR " + row.message)));
+        std::filesystem::remove(at("a.txt").path());
+    }
 }
 
 TEST_F(DocumentIdentifierTest, NeverCutsANumberToSize)
 {
-    identify(writeDocument("a.txt", "1"), "a.txt");
-    for (const std::string text : {"4294972007", "18446744073709551616004711", "4712", "0"})
+    const auto identifier = std::stoull(identify(writeDocument("a.txt", "1")));
+    const auto longer = std::to_string((std::uint64_t{1} << 32) + identifier);
+    const auto other = std::to_string(identifier ^ 1);
+    for (const std::string& text :
+        {longer, "18446744073709551616" + std::to_string(identifier), other, std::string("0")})
         EXPECT_EQ(trw_URLFromDocumentID(text), std::nullopt) << text;
     EXPECT_EQ(log->count("ERROR VXLibraryResolveDocumentId2 failed, errno:2(No such file or directory)"), 4U);
 }

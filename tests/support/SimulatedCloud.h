@@ -24,6 +24,10 @@ public:
     platform::PromisedItems& promisedItems() override { return _documents->promisedItems(); }
     platform::DocumentContainers& containers() override { return _documents->containers(); }
     platform::CloudItems& items() override { return _documents->items(); }
+    platform::DocumentIdentifiers& documentIdentifiers() override
+    {
+        return _documents->documentIdentifiers();
+    }
     platform::SecurityScopedAccess& securityScopedAccess() override
     {
         return _documents->securityScopedAccess();

@@ -122,21 +122,50 @@ public:
     void stopAccessing(const Url&) override { ++stopped; }
 };
 
+/// The real identifiers, with something that happens between the steps of a look-up.
+class DecoratedIdentifiers : public platform::DocumentIdentifiers {
+public:
+    std::function<void()> beforeOpening, beforeReading;
+
+    explicit DecoratedIdentifiers(platform::DocumentIdentifiers& real)
+        : _real(real)
+    {
+    }
+    std::optional<std::uint64_t> deviceIdentifier() override { return _real.deviceIdentifier(); }
+    Result<File> resolve(std::uint32_t identifier) override { return _real.resolve(identifier); }
+    Result<std::shared_ptr<const OpenFile>> open(const File& file) override
+    {
+        if (beforeOpening)
+            beforeOpening();
+        auto opened = _real.open(file);
+        if (beforeReading)
+            beforeReading();
+        return opened;
+    }
+    Result<std::uint32_t> identify(const Url& url) override { return _real.identify(url); }
+
+private:
+    platform::DocumentIdentifiers& _real;
+};
+
 /// The real service with these in front of its roles.
 class DecoratedCloud : public platform::CloudDocumentService {
 public:
     explicit DecoratedCloud(std::shared_ptr<platform::CloudDocumentService> real)
         : decoratedItems(real->promisedItems())
+        , decoratedIdentifiers(real->documentIdentifiers())
         , _real(std::move(real))
     {
     }
     DecoratedItems decoratedItems;
+    DecoratedIdentifiers decoratedIdentifiers;
     CountingAccess access;
 
     platform::CloudAccount& account() override { return _real->account(); }
     platform::PromisedItems& promisedItems() override { return decoratedItems; }
     platform::DocumentContainers& containers() override { return _real->containers(); }
     platform::CloudItems& items() override { return _real->items(); }
+    platform::DocumentIdentifiers& documentIdentifiers() override { return decoratedIdentifiers; }
     platform::SecurityScopedAccess& securityScopedAccess() override { return access; }
 
 private:
