@@ -1,6 +1,7 @@
 #include "host/drive/PromiseRecord.h"
 
 #include "host/drive/JsonScanner.h"
+#include "host/system/ItemPaths.h"
 
 #include <nlohmann/json.hpp>
 
@@ -81,12 +82,6 @@ void readMember(PromiseRecord& record, std::string_view key, JsonScanner& scanne
         scanner.skip();
 }
 
-std::size_t nameStart(std::string_view path)
-{
-    const auto slash = path.rfind('/');
-    return slash == std::string_view::npos ? 0 : slash + 1;
-}
-
 } // namespace
 
 std::optional<PromiseRecord> PromiseRecord::parse(std::string_view text)
@@ -131,20 +126,16 @@ std::string PromiseRecord::toJson() const
 
 std::string PromiseRecord::pathFor(std::string_view itemPath)
 {
-    const auto start = nameStart(itemPath);
-    std::string path;
-    path.reserve(itemPath.size() + 1 + suffix.size());
-    path.append(itemPath.substr(0, start)).append(".").append(itemPath.substr(start)).append(suffix);
-    return path;
+    return system::promisePath(itemPath);
 }
 
 std::optional<std::string> PromiseRecord::itemPathFor(std::string_view promisePath)
 {
-    const auto start = nameStart(promisePath);
-    const auto name = promisePath.substr(start);
-    if (!name.starts_with('.') || !name.ends_with(suffix) || name.size() <= suffix.size() + 1)
+    const auto nameAt = promisePath.rfind('/') + 1;
+    const auto name = system::itemName(promisePath.substr(nameAt));
+    if (name == promisePath.substr(nameAt))
         return std::nullopt;
-    return std::string(promisePath.substr(0, start)).append(name.substr(1, name.size() - 1 - suffix.size()));
+    return std::string(promisePath.substr(0, nameAt)).append(name);
 }
 
 } // namespace host::drive

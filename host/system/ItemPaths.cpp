@@ -18,20 +18,23 @@ std::string parentPath(const std::string& path)
     return slash == 0 ? "/" : path.substr(0, slash);
 }
 
-std::string promisePath(const std::string& path)
+std::string promisePath(std::string_view path)
 {
     const auto nameAt = path.rfind('/') + 1;
-    return path.substr(0, nameAt) + "." + path.substr(nameAt) + std::string(promiseSuffix);
+    std::string promise;
+    promise.reserve(path.size() + 1 + promiseSuffix.size());
+    promise.append(path.substr(0, nameAt)).append(".").append(path.substr(nameAt)).append(promiseSuffix);
+    return promise;
 }
 
-std::string itemName(const std::string& name)
+std::string itemName(std::string_view name)
 {
     const bool isPromise =
         name.starts_with('.') && name.ends_with(promiseSuffix) && name.size() > promiseSuffix.size() + 1;
-    return isPromise ? name.substr(1, name.size() - promiseSuffix.size() - 1) : name;
+    return std::string(isPromise ? name.substr(1, name.size() - promiseSuffix.size() - 1) : name);
 }
 
-bool isPassingName(const std::string& name)
+bool isPassingName(std::string_view name)
 {
     return name.starts_with(passingPrefix);
 }

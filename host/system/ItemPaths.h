@@ -10,11 +10,11 @@ bool isPathWithin(std::string_view path, std::string_view folder);
 /// The folder that a path lies in.
 std::string parentPath(const std::string& path);
 /// The path of an item's promise.
-std::string promisePath(const std::string& path);
+std::string promisePath(std::string_view path);
 /// The name of the item that a promise of this name stands for; any other name stays as it is.
-std::string itemName(const std::string& name);
+std::string itemName(std::string_view name);
 /// Whether a name is one that the drive gives to what is only on its way.
-bool isPassingName(const std::string& name);
+bool isPassingName(std::string_view name);
 /// Whether an item is there, or its promise.
 bool isItemThere(const std::string& path);
 
