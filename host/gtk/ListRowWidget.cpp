@@ -104,9 +104,10 @@ void trw_list_row_class_init(TrwListRowClass* type)
     gtk_widget_class_set_layout_manager_type(widget, GTK_TYPE_BOX_LAYOUT);
     gtk_widget_class_set_accessible_role(widget, GTK_ACCESSIBLE_ROLE_BUTTON);
     gtk_widget_class_set_css_name(widget, "kit-row");
-    gtk_widget_class_install_action(widget, "row.activate", nullptr, activate);
     gtk_widget_class_install_action(widget, "row.menu", nullptr, request);
     gtk_widget_class_install_action(widget, "row.peek", nullptr, request);
+    // The last one is the first that assistive technology sees, and performs by default.
+    gtk_widget_class_install_action(widget, "row.activate", nullptr, activate);
 }
 
 GtkWidget* label(const char* styleClass, PangoEllipsizeMode ellipsize)
