@@ -6,9 +6,11 @@
 #include "host/system/PosixFileSystem.h"
 #include "items/DocumentIdentifiers.h"
 #include "items/FileUtils.h"
+#include "platform/FileSystem.h"
 #include "platform/NotificationCenter.h"
 
 #include <cstdio>
+#include <map>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -62,6 +64,48 @@ int printLocation(const std::string& identifier)
     return url ? 0 : 1;
 }
 
+const char* kindName(platform::FileType type)
+{
+    switch (type) {
+    case platform::FileType::Regular:
+        return "document";
+    case platform::FileType::Directory:
+        return "folder";
+    case platform::FileType::SymbolicLink:
+        return "link";
+    case platform::FileType::Other:
+        break;
+    }
+    return "other";
+}
+
+/// Prints what a user sees below a folder, sorted by path: the kind, a tab, the path. A document that hides a
+/// promise is listed once.
+int list(const Url& folder)
+{
+    using Continue = platform::FileSystem::Continue;
+    auto& promised = platform::services().cloudDocumentService().promisedItems();
+    std::map<std::string, const char*> kinds;
+    std::optional<platform::Error> failed;
+    platform::services().fileSystem().enumerateDeeply(
+        folder,
+        [&](const Url& item, platform::FileType type) {
+            const auto logical = promised.logicalURLForPromise(item);
+            if (logical != item)
+                kinds.emplace(logical.path(), "promise");
+            else if (!item.lastPathComponent().starts_with('.'))
+                kinds.insert_or_assign(item.path(), kindName(type));
+            return Continue::Yes;
+        },
+        [&](const Url&, const platform::Error& error) {
+            failed = error;
+            return Continue::Yes;
+        });
+    for (const auto& [path, kind] : kinds)
+        std::printf("%s\t%s\n", kind, path.c_str() + folder.path().size() + 1);
+    return report(failed);
+}
+
 /// The exit status; 2 for what is no command.
 int run(std::string_view command, const std::vector<Url>& urls)
 {
@@ -71,6 +115,8 @@ int run(std::string_view command, const std::vector<Url>& urls)
         return report(FileUtils::remove(urls[0]));
     if (command == "move" && urls.size() == 2)
         return report(FileUtils::moveTo(urls[0], urls[1]));
+    if (command == "list" && urls.size() == 1)
+        return list(urls[0]);
     if (command == "evict" && urls.size() == 1)
         return FileUtils::evictDocument(urls[0]) ? 0 : 1;
     if (command == "docid" && urls.size() == 1)
@@ -90,12 +136,16 @@ int main(int argc, char** argv)
     std::vector<Url> urls;
     for (std::size_t i = 2; i < arguments.size(); ++i)
         urls.push_back(Url::fileURL(top + '/' + arguments[i]));
+    if (arguments.size() == 2 && arguments[1] == "list")
+        urls.push_back(Url::fileURL(top));
     const bool resolves = arguments.size() == 3 && arguments[1] == "resolve";
     const int status = resolves ? printLocation(arguments[2])
         : arguments.size() > 1  ? run(arguments[1], urls)
                                 : 2;
     if (status == 2)
-        std::fputs("usage: tarrow-files mkdir|remove|evict|docid PATH | move FROM TO | resolve ID\n", stderr);
+        std::fputs(
+            "usage: tarrow-files list [PATH] | mkdir|remove|evict|docid PATH | move FROM TO | resolve ID\n",
+            stderr);
     platform::installServices({});
     return status;
 }

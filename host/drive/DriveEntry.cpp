@@ -6,9 +6,11 @@
 #include "host/system/SystemErrors.h"
 
 #include <fcntl.h>
+#include <signal.h>
 
 #include <atomic>
 #include <cerrno>
+#include <charconv>
 #include <cstdio>
 
 namespace host::drive {
@@ -103,6 +105,14 @@ std::string uniqueName(const char* prefix)
     std::snprintf(name, sizeof name, "%s%x-%lx%lx-%x", prefix, static_cast<unsigned>(getpid()),
         static_cast<unsigned long>(now.tv_sec), static_cast<unsigned long>(now.tv_nsec), counter++);
     return name;
+}
+
+bool isProcessGone(const std::string& uniqueName)
+{
+    int process = 0;
+    const char* begin = uniqueName.data() + uniqueName.find('-') + 1;
+    std::from_chars(begin, uniqueName.data() + uniqueName.size(), process, 16);
+    return process > 0 && ::kill(process, 0) != 0 && errno == ESRCH;
 }
 
 } // namespace host::drive

@@ -56,5 +56,7 @@ int syncFolder(const host::system::FileDescriptor& folder);
 host::system::FileDescriptor openOwnFolder(const std::string& path);
 /// A name that nothing has yet in any folder: a prefix, the process, the time, a number.
 std::string uniqueName(const char* prefix);
+/// Whether the process that made such a name is known to be gone.
+bool isProcessGone(const std::string& uniqueName);
 
 } // namespace host::drive

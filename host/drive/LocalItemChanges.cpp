@@ -68,6 +68,26 @@ Error changeError(int errorNumber, const std::string& path)
     return errorNumber == changedMeanwhile ? Error(FileErrorCode::Cancelled) : itemError(errorNumber, path);
 }
 
+/// Makes one folder and notes it, unless it is there already.
+std::optional<Error> makeFolder(
+    const DriveLayout& layout, const std::string& path, std::vector<DriveEntry>& made)
+{
+    auto entry = DriveEntry::open(layout, path);
+    if (!entry)
+        return entry.error;
+    struct stat found;
+    int failure = checkIsFree(*entry);
+    if (failure == 0)
+        failure = ::mkdirat(entry->folder.get(), entry->name.c_str(), 0777) == 0 ? 0 : errno;
+    if (failure == EEXIST && entry->status(found) == 0 && S_ISDIR(found.st_mode))
+        return std::nullopt;
+    if (failure == 0) {
+        made.push_back(std::move(*entry.value));
+        failure = syncFolder(made.back().folder);
+    }
+    return failure == 0 ? std::nullopt : std::optional(itemError(failure, path));
+}
+
 Error intoItself(const std::string& from, const std::string& to)
 {
     platform::PropertyDictionary info;
@@ -91,22 +111,16 @@ std::optional<Error> LocalItemChanges::createFolder(const std::string& path)
     const auto& root = _layout.documents();
     if (!path.starts_with(root + '/'))
         return itemError(EXDEV, path);
-    for (auto slash = path.find('/', root.size() + 1);; slash = path.find('/', slash + 1)) {
-        const bool isLast = slash == std::string::npos;
-        const auto entry = DriveEntry::open(_layout, path.substr(0, slash));
-        if (!entry)
-            return entry.error;
-        struct stat found;
-        int failure = checkIsFree(*entry);
-        if (failure == 0 && ::mkdirat(entry->folder.get(), entry->name.c_str(), 0777) != 0)
-            failure = errno;
-        else if (failure == 0)
-            failure = syncFolder(entry->folder);
-        if (failure == EEXIST && entry->status(found) == 0 && S_ISDIR(found.st_mode))
-            failure = 0;
-        if (failure != 0 || isLast)
-            return failure == 0 ? std::nullopt : std::optional(itemError(failure, entry->path));
+    std::vector<DriveEntry> made;
+    std::optional<Error> error;
+    for (auto slash = root.size(); !error && slash != std::string::npos;) {
+        slash = path.find('/', slash + 1);
+        error = makeFolder(_layout, path.substr(0, slash), made);
     }
+    // Those on the way that were made for nothing go again, unless somebody uses one by now.
+    for (auto entry = made.rbegin(); error && entry != made.rend(); ++entry)
+        ::unlinkat(entry->folder.get(), entry->name.c_str(), AT_REMOVEDIR);
+    return error;
 }
 
 std::optional<Error> LocalItemChanges::removeItem(

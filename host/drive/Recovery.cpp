@@ -11,11 +11,9 @@
 #include "platform/Log.h"
 
 #include <fcntl.h>
-#include <signal.h>
 #include <sys/xattr.h>
 
 #include <cerrno>
-#include <charconv>
 
 namespace host::drive {
 
@@ -42,15 +40,6 @@ DriveEntry renamed(const DriveEntry& entry, const char* prefix)
 {
     return {FileDescriptor(::fcntl(entry.folder.get(), F_DUPFD_CLOEXEC, 0)),
         prefix + entry.name.substr(entry.name.find('-') + 1), entry.path};
-}
-
-/// Private names begin with a prefix and the process; one that is not known to be gone lives.
-bool isProcessGone(const std::string& name)
-{
-    int process = 0;
-    const char* begin = name.data() + name.find('-') + 1;
-    std::from_chars(begin, name.data() + name.size(), process, 16);
-    return process > 0 && ::kill(process, 0) != 0 && errno == ESRCH;
 }
 
 /// The document that a promise's name stands for; another name stands for itself.

@@ -5,10 +5,8 @@
 #include "host/system/DirectoryReader.h"
 
 #include <fcntl.h>
-#include <sys/stat.h>
 
 #include <cerrno>
-#include <ctime>
 #include <memory>
 
 namespace host::drive {
@@ -26,14 +24,6 @@ bool lockWhole(const FileDescriptor& file, int command)
     lock.l_type = F_WRLCK;
     lock.l_whence = SEEK_SET;
     return ::fcntl(file.get(), command, &lock) == 0;
-}
-
-/// A record without its text may be one that its process has only just made, and not locked yet.
-bool isFresh(const FileDescriptor& file)
-{
-    constexpr time_t longest = 60;
-    struct stat found;
-    return ::fstat(file.get(), &found) == 0 && ::time(nullptr) - found.st_mtime < longest;
 }
 
 std::string textOf(const WorkRecord::Places& places)
@@ -111,9 +101,10 @@ void WorkRecord::forEachAbandoned(const DriveLayout& layout, const std::function
         const FileDescriptor file(::open(path.c_str(), O_RDWR | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC));
         if (!file || !lockWhole(file, F_OFD_SETLK))
             continue; // its process still works
+        // One without its text may be a living process's that has not locked it yet.
         const auto text = readSmallFile(file, path, largestRecord);
         const auto places = text ? placesOf(*text) : Places{};
-        if (places.working.empty() ? !isFresh(file) : settle(places))
+        if (places.working.empty() ? isProcessGone(std::string(entry->name)) : settle(places))
             ::unlink(path.c_str());
     }
 }

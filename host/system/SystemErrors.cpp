@@ -83,7 +83,7 @@ std::string displayName(std::string_view path)
     if (const auto slash = path.rfind('/'); slash != std::string_view::npos && path.size() > 1)
         path.remove_prefix(slash + 1);
     const std::unique_ptr<char, decltype(&g_free)> valid(
-        g_utf8_make_valid(path.data(), static_cast<gssize>(path.size())), g_free);
+        g_utf8_make_valid(path.empty() ? "" : path.data(), static_cast<gssize>(path.size())), g_free);
     return valid.get();
 }
 
