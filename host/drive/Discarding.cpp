@@ -48,8 +48,11 @@ public:
     int visitItem(const FileDescriptor& folder, const std::string& name, const struct stat& found) override
     {
         if (_store && S_ISREG(found.st_mode) && PromiseRecord::itemPathFor(name)) {
-            const auto content = contentOfPromise(folder, name);
-            if (const int failed = content.empty() ? 0 : _store->remove(content); failed != 0)
+            std::string content;
+            int failed = contentOfPromise(folder, name, content);
+            if (failed == 0 && !content.empty())
+                failed = _store->remove(content);
+            if (failed != 0)
                 return note(failed);
             hasBegun = hasBegun || !content.empty();
         }

@@ -31,13 +31,15 @@ FileDescriptor LocalCloudStore::openFolder() const
 
 FileDescriptor LocalCloudStore::openContent(const std::string& content) const
 {
-    const auto folder = isPlainName(content) ? openFolder() : FileDescriptor();
-    if (!folder) {
+    if (!isPlainName(content)) {
         errno = ENOENT;
         return {};
     }
-    return FileDescriptor(
-        ::openat(folder.get(), content.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
+    // Why the folder cannot be had stays in errno: only what is missing is nothing.
+    const auto folder = openFolder();
+    return folder ? FileDescriptor(::openat(
+               folder.get(), content.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC))
+                  : FileDescriptor();
 }
 
 int LocalCloudStore::fetch(const std::string& content, const FileDescriptor& into, const Progress& progress)
@@ -65,27 +67,30 @@ int LocalCloudStore::store(const DriveEntry& document, const ItemVersion& versio
         return errno;
     if (const int failure = renameEntry(document.folder, document.name, folder, content); failure != 0)
         return failure;
-    if (::fstatat(folder.get(), content.c_str(), &moved, AT_SYMLINK_NOFOLLOW) == 0
-        && isSameContent(version, versionOf(moved)))
-        return syncFolder(folder);
-    const int failure = renameEntry(folder, content, document.folder, document.name);
-    return failure == 0 ? ECANCELED : failure;
+    int failure = ::fstatat(folder.get(), content.c_str(), &moved, AT_SYMLINK_NOFOLLOW) == 0 ? 0 : errno;
+    if (failure == 0 && !isSameContent(version, versionOf(moved)))
+        failure = ECANCELED;
+    if (failure == 0)
+        failure = syncFolder(folder);
+    if (failure != 0)
+        renameEntry(folder, content, document.folder, document.name);
+    return failure;
 }
 
 int LocalCloudStore::remove(const std::string& content)
 {
-    const auto folder = openFolder();
-    if (!folder || !isPlainName(content))
+    if (!isPlainName(content))
         return 0;
-    return ::unlinkat(folder.get(), content.c_str(), 0) == 0 || errno == ENOENT ? 0 : errno;
+    const auto folder = openFolder();
+    return (folder && ::unlinkat(folder.get(), content.c_str(), 0) == 0) || errno == ENOENT ? 0 : errno;
 }
 
 int LocalCloudStore::move(const std::string& content, const std::string& newContent)
 {
-    const auto folder = openFolder();
-    if (!folder || !isPlainName(content) || !isPlainName(newContent))
+    if (!isPlainName(content) || !isPlainName(newContent))
         return ENOENT;
-    return renameEntry(folder, content, folder, newContent);
+    const auto folder = openFolder();
+    return folder ? renameEntry(folder, content, folder, newContent) : errno;
 }
 
 bool LocalCloudStore::holdsOtherThan(const std::string& content, const FileDescriptor& document)

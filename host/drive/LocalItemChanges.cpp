@@ -167,7 +167,7 @@ std::optional<Error> LocalItemChanges::moveItem(const std::string& from, const s
     if (!source->isPromise())
         dropRedundantPromise(source->entry, *_store);
     const auto newName = source->isPromise() ? target->promiseName() : target->name;
-    int failure = renameEntry(source->entry.folder, source->name, target->folder, newName);
+    int failure = moveWithin(*source, *target, newName);
     if (failure == EXDEV)
         failure = moveAcross(*source, *target, newName);
     // To the kernel it is an invalid argument when the one name leads through the other by a mount.
@@ -175,11 +175,22 @@ std::optional<Error> LocalItemChanges::moveItem(const std::string& from, const s
         return intoItself(from, to);
     if (failure != 0)
         return failure == changedMeanwhile ? changeError(failure, from) : systemError(failure, from, to);
-    for (const auto* entry : {&*target, &source->entry}) {
-        if (failure = syncFolder(entry->folder); failure != 0)
-            return itemError(failure, entry->path);
-    }
     return std::nullopt;
+}
+
+int LocalItemChanges::moveWithin(
+    const LocatedItem& source, const DriveEntry& target, const std::string& newName)
+{
+    int failure = renameEntry(source.entry.folder, source.name, target.folder, newName);
+    if (failure != 0)
+        return failure;
+    failure = syncFolder(target.folder);
+    if (failure == 0)
+        failure = syncFolder(source.entry.folder);
+    // A move that might not outlive a power cut is none.
+    if (failure != 0)
+        renameEntry(target.folder, newName, source.entry.folder, source.name);
+    return failure;
 }
 
 int LocalItemChanges::moveAcross(
@@ -268,7 +279,8 @@ int LocalItemChanges::replaceByPromise(const LocatedItem& item)
     struct stat found;
     if (failure != 0 && entry.status(found) == 0)
         dropRedundantPromise(entry, *_store);
-    return failure == 0 ? syncFolder(entry.folder) : failure;
+    // The document's old name needs no sync: come back after a power cut it would hide its promise, no more.
+    return failure;
 }
 
 } // namespace host::drive

@@ -35,6 +35,7 @@ public:
 
 private:
     int removeLocated(const LocatedItem& item);
+    int moveWithin(const LocatedItem& source, const DriveEntry& target, const std::string& newName);
     int moveAcross(const LocatedItem& source, const DriveEntry& target, const std::string& newName);
     int removeMoved(const LocatedItem& source, const TreeVersions& before, const std::string& copy);
     void withdraw(const DriveEntry& target, const std::string& name, const TreeVersions& copied);

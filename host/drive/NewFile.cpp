@@ -57,8 +57,11 @@ int NewFile::publish(const DriveEntry& entry, const std::string& name)
         return errno;
     if (const int failure = renameEntry(_folder, _name, entry.folder, name); failure != 0)
         return failure;
-    _name.clear();
-    return syncFolder(entry.folder);
+    const int failure = syncFolder(entry.folder);
+    // It comes back under its private name, and goes with it.
+    if (failure == 0 || renameEntry(entry.folder, name, _folder, _name) != 0)
+        _name.clear();
+    return failure;
 }
 
 } // namespace host::drive

@@ -5,6 +5,8 @@
 
 #include <fcntl.h>
 
+#include <cerrno>
+
 namespace host::drive {
 
 using host::system::FileDescriptor;
@@ -20,12 +22,16 @@ platform::Result<PromiseRecord> readPromise(const DriveEntry& entry)
                    : damagedRecord(entry.path, "its promise is no JSON object");
 }
 
-std::string contentOfPromise(const FileDescriptor& folder, const std::string& promiseName)
+int contentOfPromise(const FileDescriptor& folder, const std::string& promiseName, std::string& content)
 {
     const auto text =
         host::system::readWholeFile(folder, promiseName, PromiseRecord::maximumFileSize, promiseName);
     const auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
-    return promise ? promise->content : std::string();
+    content = promise ? promise->content : std::string();
+    // What is too large is damaged; nothing else that the system says means that nothing lies behind it.
+    const bool hasFailed =
+        text.error && text.error->domain() == platform::errorDomain::system && text.error->code() != EFBIG;
+    return hasFailed ? text.error->code() : 0;
 }
 
 void dropRedundantPromise(const DriveEntry& entry, CloudStore& store)

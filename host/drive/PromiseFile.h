@@ -10,9 +10,10 @@ namespace host::drive {
 /// The promise of an entry as it lies on the disk. Errors: the system's, or CloudErrorCode::DamagedRecord.
 platform::Result<PromiseRecord> readPromise(const DriveEntry& entry);
 
-/// The name of the content behind a promise file of an open folder; empty when there is none or the promise
-/// cannot be read.
-std::string contentOfPromise(const system::FileDescriptor& folder, const std::string& promiseName);
+/// Finds the name of the content behind a promise file of an open folder; it is empty when the promise names
+/// none or is damaged. Answers 0, or the errno of what could not be read.
+int contentOfPromise(
+    const system::FileDescriptor& folder, const std::string& promiseName, std::string& content);
 
 /// Removes the promise beside a document when it adds nothing: nothing lies behind it, or what the document
 /// holds as well. Any other is an item that nobody has seen since the document hides it, and stays.
