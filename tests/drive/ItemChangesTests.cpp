@@ -192,6 +192,91 @@ TEST_F(ItemChangesTest, MovesToAnotherFileSystemAndBack)
     EXPECT_EQ(result, 0);
 }
 
+TEST_F(ItemChangesTest, APromiseBesideADocumentGoesOnlyWhenItAddsNothing)
+{
+    fs::create_directories(layout().cloud());
+    const auto makeTwins = [&](const std::string& name, const char* behind) {
+        host::drive::PromiseRecord promise;
+        promise.content = "content";
+        fs::remove(layout().cloud() + "/content");
+        if (behind)
+            std::ofstream(layout().cloud() + "/content") << behind;
+        writePromise(name, promise);
+        return writeDocument(name, "document");
+    };
+    const auto hasPromise = [](const Url& item) {
+        return fs::exists(host::drive::PromiseRecord::pathFor(item.path()));
+    };
+    for (const char* redundant : {static_cast<const char*>(nullptr), "document"}) {
+        const auto item = makeTwins("a.txt", redundant);
+        EXPECT_FALSE(changes().removeItem(item.path(), std::nullopt));
+        EXPECT_FALSE(fs::exists(item.path()) || hasPromise(item));
+        EXPECT_TRUE(fs::is_empty(layout().cloud()));
+    }
+    const auto item = makeTwins("a.txt", "unseen");
+    const auto refused = changes().evictItem(item.path());
+    ASSERT_TRUE(refused);
+    EXPECT_TRUE(refused->is(FileErrorCode::ItemExists));
+    EXPECT_EQ(contentOf(item.path()), "document");
+    EXPECT_FALSE(changes().moveItem(item.path(), url("moved.txt").path()));
+    EXPECT_TRUE(hasPromise(item) && !hasPromise(url("moved.txt")));
+    writeDocument("a.txt", "document");
+    EXPECT_FALSE(changes().removeItem(item.path(), std::nullopt));
+    EXPECT_TRUE(hasPromise(item));
+    EXPECT_EQ(contentOf(layout().cloud() + "/content"), "unseen");
+    EXPECT_FALSE(changes().removeItem(item.path(), std::nullopt)) << "the promise shows, and can be removed";
+    EXPECT_TRUE(fs::is_empty(layout().cloud()));
+}
+
+TEST_F(ItemChangesTest, WhatCannotBePutBackGoesToTheTrash)
+{
+    const auto folder = makeFolder("folder");
+    for (const auto& name : {"folder/a.txt", "b.txt"}) {
+        const auto item = writeDocument(name, "old");
+        const auto child = ::fork();
+        if (child == 0) {
+            const auto held = take(item);
+            ::kill(::getpid(), SIGKILL);
+        }
+        ::waitpid(child, nullptr, 0);
+    }
+    fs::remove_all(folder.path());
+    writeDocument("b.txt", "new");
+    std::ofstream(layout().trash() + "/b.txt") << "older";
+    recover();
+    EXPECT_EQ(heldCount(), 0U);
+    EXPECT_EQ(contentOf(url("b.txt").path()), "new");
+    EXPECT_EQ(contentOf(layout().trash() + "/a.txt"), "old");
+    EXPECT_EQ(contentOf(layout().trash() + "/b.txt"), "older");
+    EXPECT_EQ(contentOf(layout().trash() + "/b.txt 2"), "old");
+}
+
+TEST_F(ItemChangesTest, AMountIsNeitherEnteredNorALeadIntoOneself)
+{
+    const auto outside = folder().write("outside/kept.txt", "precious");
+    const auto tree = makeFolder("tree"), sub = makeFolder("tree/sub"), mounted = makeFolder("tree/mounted");
+    const auto other = makeFolder("other"), file = writeDocument("tree/a.txt", "a");
+    const auto result = withMounts([&] {
+        const auto bind = [](const std::string& from, const std::string& to) {
+            return ::mount(from.c_str(), to.c_str(), nullptr, MS_BIND, nullptr) == 0;
+        };
+        if (!bind(sub.path(), other.path()))
+            return 99;
+        const auto intoItself = changes().moveItem(tree.path(), other.path() + "/tree");
+        if (!intoItself || intoItself->code() != EINVAL || !fs::is_empty(sub.path()))
+            return 1;
+        if (!bind(folder().at("outside"), mounted.path()))
+            return 99;
+        const auto removed = changes().removeItem(tree.path(), std::nullopt);
+        if (!removed || removed->code() != EBUSY || contentOf(outside) != "precious")
+            return 2;
+        return contentOf(file.path()) == "a" && !hasTemporary(sub.path()) ? 0 : 3;
+    });
+    if (!result)
+        GTEST_SKIP() << "nothing can be mounted here";
+    EXPECT_EQ(result, 0);
+}
+
 TEST_F(ItemChangesTest, NothingChangesOnAReadOnlyDrive)
 {
     const auto file = writeDocument("a.txt", "a");

@@ -5,10 +5,13 @@
 #include <gmock/gmock.h>
 
 #include <sys/stat.h>
+#include <sys/wait.h>
+#include <unistd.h>
 
 #include <cerrno>
 #include <filesystem>
 #include <fstream>
+#include <map>
 
 using namespace tarrow;
 using items_tests::ItemsFixture;
@@ -251,6 +254,123 @@ TEST_F(FileChangesTest, AFolderSwappedForALinkLeadsNowhere)
     EXPECT_FALSE(fs::exists(folder().at("outside/b.txt")));
     EXPECT_EQ(contentOf(at("from.away/a.txt")), "a");
     EXPECT_EQ(contentOf(free), "b");
+}
+
+/// Everything below a folder by its path, with its content or target.
+std::map<std::string, std::string> everything(const std::string& folder)
+{
+    std::map<std::string, std::string> found;
+    for (const auto& entry : fs::recursive_directory_iterator(folder)) {
+        std::ifstream file(entry.path());
+        found[entry.path()] = entry.is_symlink() ? fs::read_symlink(entry.path()).string()
+            : entry.is_directory()               ? "folder"
+                                                 : std::string(std::istreambuf_iterator<char>(file), {});
+    }
+    return found;
+}
+
+TEST_F(FileChangesTest, BadInputIsToldAndChangesNothing)
+{
+    const auto file = writeDocument("a.txt", "a"), folder = makeFolder("folder");
+    writeDocument("folder/b.txt", "b");
+    writeLink("link", folder.path());
+    const auto promised = writePromise("p.txt", {});
+    std::string composed, decomposed; // 128 letters: 256 and 384 bytes
+    for (int i = 0; i < 128; ++i) {
+        composed += "\u00e9";
+        decomposed += "e\u0301";
+    }
+    const auto tooLongToEvict = writeDocument(std::string(250, 'n'), "n");
+    struct Row {
+        const char* name;
+        std::optional<Error> error;
+        int code;
+    };
+    const auto before = everything(layout().documents());
+    const Row rows[] = {
+        {"256 bytes", FileUtils::mkdir(at(composed)), 514},
+        {"384 bytes of as many letters", FileUtils::moveTo(file, at(decomposed)), 514},
+        {"256 bytes on the way", FileUtils::mkdir(at("new/" + composed + "/x")), 514},
+        {"a promise whose file's name is too long", FileUtils::moveTo(promised, at(std::string(250, 'p'))),
+            514},
+        {"eviction under such a name", DriveFixture::cloud->items().evictItem(tooLongToEvict), 514},
+        {"a folder into itself", FileUtils::moveTo(folder, at("folder/in")), EINVAL},
+        {"a folder into itself by a link", FileUtils::moveTo(folder, at("link/in")), ENOTDIR},
+        {"a file into a link", FileUtils::moveTo(file, at("link/a.txt")), ENOTDIR},
+        {"below a file", FileUtils::mkdir(at("a.txt/x")), 516},
+        {"the drive itself", FileUtils::moveTo(Url::fileURL(layout().documents()), at("x")), EXDEV},
+        {"a NUL", FileUtils::mkdir(Url::fileURL(at("a").path() + std::string(1, '\0') + "b")), 514},
+    };
+    for (const auto& [name, error, code] : rows) {
+        EXPECT_THAT(error, HasCode(code)) << name;
+        EXPECT_FALSE(error && error->text(platform::errorKey::localizedDescription).value_or("").empty())
+            << name;
+    }
+    EXPECT_EQ(everything(layout().documents()), before);
+    expectNoTraces();
+}
+
+TEST_F(FileChangesTest, NamesThatDifferByAnyByteAreItemsOfTheirOwn)
+{
+    struct Row {
+        const char* name;
+        std::string from, to;
+    };
+    const Row rows[] = {{"case", "a.txt", "A.txt"}, {"normalisation", "\u00e9.txt", "e\u0301.txt"},
+        {"invalid bytes", "bad\xff.txt", "bad\xfe.txt"},
+        {"255 bytes", std::string(255, 'n'), std::string(254, 'n') + 'N'}};
+    for (const auto& [name, from, to] : rows) {
+        // A name that is no UTF-8 exists on the disk, however it came there.
+        const auto source = at(from), target = at(to);
+        writeFile(source.path(), "first");
+        EXPECT_FALSE(FileUtils::moveTo(source, target)) << name;
+        EXPECT_EQ(contentOf(target), "first") << name;
+        EXPECT_FALSE(isThere(source)) << name;
+        writeFile(source.path(), "second");
+        EXPECT_THAT(FileUtils::moveTo(source, target), HasCode(516)) << name;
+        EXPECT_FALSE(FileUtils::remove(target)) << name;
+        EXPECT_EQ(contentOf(source), "second") << name;
+    }
+    expectNoTraces();
+}
+
+TEST_F(FileChangesTest, WithoutPermissionAllStaysAsItIs)
+{
+    makeFolder("closed/sub");
+    const auto file = writeDocument("closed/sub/a.txt", "a"), folder = at("closed");
+    const auto before = everything(layout().documents());
+    const auto sub = file.deletingLastPathComponent();
+    const auto child = ::fork();
+    if (child == 0) {
+        // Root may do anything, so another user owns the drive and does it.
+        constexpr unsigned nobody = 65534;
+        if (::geteuid() == 0) {
+            for (const auto& entry : fs::recursive_directory_iterator(DriveFixture::folder().path()))
+                static_cast<void>(::lchown(entry.path().c_str(), nobody, nobody));
+            if (::chown(DriveFixture::folder().path().c_str(), nobody, nobody) != 0
+                || ::setresuid(nobody, nobody, nobody) != 0)
+                ::_exit(99);
+        }
+        ::chmod(sub.path().c_str(), 0500);
+        const std::optional<Error> errors[] = {FileUtils::remove(file), FileUtils::remove(folder),
+            FileUtils::moveTo(file, at("a.txt")), FileUtils::mkdir(sub.appendingPathComponent("new")),
+            DriveFixture::cloud->items().evictItem(file)};
+        int wrong = 1;
+        for (const auto& error : errors) {
+            if (!error || error->code() != EACCES)
+                ::_exit(wrong);
+            ++wrong;
+        }
+        ::chmod(sub.path().c_str(), 0700);
+        ::_exit(0);
+    }
+    int status = 0;
+    ::waitpid(child, &status, 0);
+    if (WEXITSTATUS(status) == 99)
+        GTEST_SKIP() << "no other user can be taken here";
+    EXPECT_EQ(status, 0);
+    EXPECT_EQ(everything(layout().documents()), before);
+    expectNoTraces();
 }
 
 TEST_F(FileChangesTest, EvictsADocumentAndKeepsWhatIsKnownOfIt)
