@@ -43,6 +43,27 @@ bool Accessible::isButton() const
     return atspi_accessible_get_role(_node.get(), nullptr) == ATSPI_ROLE_PUSH_BUTTON;
 }
 
+bool Accessible::isEntry() const
+{
+    const auto role = atspi_accessible_get_role(_node.get(), nullptr);
+    return role == ATSPI_ROLE_ENTRY || role == ATSPI_ROLE_TEXT;
+}
+
+bool Accessible::isDialog() const
+{
+    return atspi_accessible_get_role(_node.get(), nullptr) == ATSPI_ROLE_DIALOG;
+}
+
+bool Accessible::enter(const std::string& text) const
+{
+    auto* editable = atspi_accessible_get_editable_text_iface(_node.get());
+    if (!editable)
+        return false;
+    const bool done = atspi_editable_text_set_text_contents(editable, text.c_str(), nullptr);
+    g_object_unref(editable);
+    return done;
+}
+
 bool Accessible::press() const
 {
     auto* action = atspi_accessible_get_action_iface(_node.get());

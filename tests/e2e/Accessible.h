@@ -26,6 +26,10 @@ public:
     /// at.
     std::vector<Accessible> all(const std::function<bool(const Accessible&)>& matches) const;
     bool isButton() const;
+    bool isEntry() const;
+    bool isDialog() const;
+    /// Replaces the text of an entry; false when it takes none.
+    bool enter(const std::string& text) const;
 
     /// The running application of this program name; null: it has not appeared.
     static Accessible application(const std::string& program);

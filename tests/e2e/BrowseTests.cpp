@@ -19,7 +19,7 @@ class BrowseTests : public ::testing::Test {
 protected:
     void SetUp() override
     {
-        ASSERT_EQ(atspi_init(), 0);
+        ASSERT_LE(atspi_init(), 1); // 1: a test before this one did it
         // The first look starts the registry; a program that comes before it may stay unseen.
         atspi_accessible_get_child_count(atspi_get_desktop(0), nullptr);
         start();
@@ -91,6 +91,40 @@ TEST_F(BrowseTests, TwoFoldersInAndBack)
     press("Back");
     EXPECT_TRUE(Accessible::waitFor([this] { return !shows("Ideas.md"); }));
     EXPECT_TRUE(shows("Photos"));
+}
+
+TEST_F(BrowseTests, ANewFolderIsMadeOnceItsNameIsAccepted)
+{
+    const auto find = [this](auto matches) { return program.all(matches); };
+    const auto entries = [&] { return find([](const Accessible& node) { return node.isEntry(); }); };
+    const auto says = [&](const char* text) {
+        return !find([&](const Accessible& node) { return node.name() == text; }).empty();
+    };
+    press("Photos");
+    EXPECT_TRUE(Accessible::waitFor([&] { return shows("Summer in Tuscany"); }));
+    // A press that meets the bar while it still slides in is lost with the button, so it is made again.
+    int looks = 0;
+    EXPECT_TRUE(Accessible::waitFor([&] {
+        if (shows("New Folder"))
+            return true;
+        if (looks++ % 20 == 0)
+            press("Select");
+        return false;
+    }));
+    press("New Folder");
+    ASSERT_TRUE(Accessible::waitFor([&] { return !entries().empty(); }));
+    EXPECT_EQ(entries().back().name(), "Folder Name");
+    const auto dialogs = find([](const Accessible& node) { return node.isDialog(); });
+    ASSERT_EQ(dialogs.size(), 1);
+    EXPECT_EQ(dialogs.front().name(), "New Folder");
+
+    EXPECT_TRUE(entries().back().enter("a/b"));
+    EXPECT_TRUE(Accessible::waitFor([&] { return says("Character not allowed in filename"); }));
+    EXPECT_TRUE(entries().back().enter("Old pictures"));
+    EXPECT_TRUE(Accessible::waitFor([&] { return !says("Character not allowed in filename"); }));
+    press("Create");
+    EXPECT_TRUE(Accessible::waitFor([&] { return shows("Old pictures"); }));
+    EXPECT_TRUE(Accessible::waitFor([&] { return entries().empty(); }));
 }
 
 } // namespace
