@@ -38,6 +38,7 @@ public:
         std::string name;
         FolderEntryKind kind = FolderEntryKind::Library;
         std::string iconName;
+        bool operator==(const ExtraItem&) const = default;
     };
 
     class Builder;

@@ -11,7 +11,7 @@ namespace {
 
 namespace ui = platform::ui;
 
-constexpr int iconSize = 32, smallIconSize = 16;
+constexpr int iconSize = 40, smallIconSize = 16;
 constexpr float markMargin = 8; ///< beside a check mark a finger still means it
 constexpr int dotDiameter = 10, dotStep = 7; ///< dots of several tags overlap
 

@@ -110,10 +110,7 @@ bool ListViewPeer::listKeyPressed(guint key, GdkModifierType modifiers)
         list->selectAllByUser();
         return true;
     }
-    if (key != GDK_KEY_F10 || !isWith(modifiers, noModifiers))
-        return false;
-    showMenuOfList(gtk_widget_get_width(_listWidget) / 2.0, 0);
-    return true;
+    return false;
 }
 
 bool ListViewPeer::extendByKey(std::size_t from, guint key)

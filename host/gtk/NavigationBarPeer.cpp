@@ -22,6 +22,17 @@ GtkWidget* makeIconButton(const char* icon, const std::string& name)
     return button;
 }
 
+/// A key that presses a button wherever the keyboard is, as long as the button is shown.
+void addShortcut(GtkWidget* button, guint key)
+{
+    auto* shortcuts = gtk_shortcut_controller_new();
+    gtk_shortcut_controller_set_scope(GTK_SHORTCUT_CONTROLLER(shortcuts), GTK_SHORTCUT_SCOPE_GLOBAL);
+    gtk_shortcut_controller_add_shortcut(GTK_SHORTCUT_CONTROLLER(shortcuts),
+        gtk_shortcut_new(gtk_keyval_trigger_new(key, static_cast<GdkModifierType>(0)),
+            GTK_SHORTCUT_ACTION(g_object_ref(gtk_activate_action_get()))));
+    gtk_widget_add_controller(button, shortcuts);
+}
+
 } // namespace
 
 NavigationBarPeer::NavigationBarPeer(std::shared_ptr<PeerContext> context)
@@ -36,6 +47,7 @@ NavigationBarPeer::NavigationBarPeer(std::shared_ptr<PeerContext> context)
     adw_header_bar_set_title_widget(bar, _title);
     adw_header_bar_pack_start(bar, _back);
     adw_header_bar_pack_end(bar, _menu);
+    addShortcut(_menu, GDK_KEY_F10);
     adw_header_bar_pack_end(bar, _search);
     _connections.push_back(connectSignal<void()>(_menu, "clicked", [this] {
         if (const auto make = _makeMenu)

@@ -95,6 +95,8 @@ void DocumentListController::setEditingAnimated(bool editing, bool)
 {
     _editing = editing;
     if (isViewLoaded())
+        offerSearch();
+    if (isViewLoaded())
         _listView->setSelectionMode(editing ? ui::SelectionMode::Multiple : ui::SelectionMode::None);
 }
 

@@ -1,6 +1,7 @@
 #include "platform/components/DocumentListController.h"
 
 #include "platform/Dispatch.h"
+#include "platform/FolderLister.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/components/DocumentRowSource.h"
@@ -21,6 +22,7 @@ namespace {
 
 /// A folder that is listed sooner never shows that it was loading.
 constexpr auto loadingDelay = std::chrono::milliseconds(300);
+constexpr auto librarySettles = std::chrono::seconds(1);
 
 void fill(ui::View& parent, const std::shared_ptr<ui::View>& view)
 {
@@ -98,11 +100,7 @@ void DocumentListController::viewDidLoad()
     _listView->setListDelegate(
         std::shared_ptr<ui::ListViewDelegate>(self(), static_cast<ui::ListViewDelegate*>(this)));
     _listView->setSelectionMode(_editing ? ui::SelectionMode::Multiple : ui::SelectionMode::None);
-    if (shouldShowSearch())
-        navigationItem().setSearchAction([weak = std::weak_ptr(self())] {
-            if (const auto list = weak.lock())
-                list->startSearchWithQueryStringBecomeFirstResponder({}, true);
-        });
+    offerSearch();
     if (!_presentedURL)
         return;
     navigationItem().setMenu(localized("Order and Options"), [weak = std::weak_ptr(self())] {
@@ -115,13 +113,52 @@ void DocumentListController::viewDidLoad()
                 list->contentsDidChange(update);
         });
     refresh();
+    followLibraries();
     showLoadingAfterDelay();
+}
+
+void DocumentListController::offerSearch()
+{
+    // While items are chosen a result could not be opened, and a narrow bar has no room to spare.
+    if (!shouldShowSearch() || _editing)
+        return navigationItem().setSearchAction({});
+    navigationItem().setSearchAction([weak = std::weak_ptr(self())] {
+        if (const auto list = weak.lock())
+            list->startSearchWithQueryStringBecomeFirstResponder({}, true);
+    });
 }
 
 void DocumentListController::refresh()
 {
-    if (_contents)
-        _contents->start(extraItemsOf(*_presentedURL), _order);
+    if (!_contents)
+        return;
+    _shownLibraries = extraItemsOf(*_presentedURL);
+    _contents->start(_shownLibraries, _order);
+}
+
+void DocumentListController::followLibraries()
+{
+    if (rootFolder() != _presentedURL)
+        return;
+    _libraries = services().folderLister().list(_presentedURL->deletingLastPathComponent(), {},
+        FolderGrouping::FoldersFirst, [weak = std::weak_ptr(self())](const auto&) {
+            const auto list = weak.lock();
+            if (!list)
+                return;
+            list->librariesMayHaveChanged();
+            // What a library is called may be written after its folder.
+            auto& dispatch = services().dispatch();
+            dispatch.after(librarySettles, dispatch.mainQueue(), [weak] {
+                if (const auto later = weak.lock())
+                    later->librariesMayHaveChanged();
+            });
+        });
+}
+
+void DocumentListController::librariesMayHaveChanged()
+{
+    if (extraItemsOf(*_presentedURL) != _shownLibraries)
+        refresh();
 }
 
 void DocumentListController::viewDidAppear(bool animated)

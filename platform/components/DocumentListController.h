@@ -16,6 +16,9 @@
 #include <string>
 #include <vector>
 
+namespace platform {
+class FolderListing;
+}
 namespace platform::ui {
 class ListView;
 } // namespace platform::ui
@@ -124,6 +127,9 @@ private:
     std::shared_ptr<DocumentListController> self();
     void contentsDidChange(const FolderContentsUpdate& update);
     void showStateOfFolder();
+    void offerSearch();
+    void followLibraries();
+    void librariesMayHaveChanged();
     void showLoadingAfterDelay();
     void reportRemovalIfShown();
     void open(const Url& url, FolderEntryKind kind);
@@ -139,6 +145,8 @@ private:
     std::shared_ptr<DocumentRowSource> _rows;
     std::shared_ptr<FolderContents> _contents;
     std::shared_ptr<DocumentSearch> _search;
+    std::shared_ptr<FolderListing> _libraries; ///< of the drive's top level: tells when libraries come or go
+    std::vector<FolderSnapshot::ExtraItem> _shownLibraries;
     std::map<std::string, std::shared_ptr<void>> _associatedObjects;
     DocumentListActionSet _availableActions = 0;
     ListOrder _order;

@@ -2,6 +2,7 @@
 
 #include "platform/Localization.h"
 #include "platform/ui/AlertController.h"
+#include "platform/ui/TapRecognizer.h"
 #include "platform/ui/View.h"
 
 #include <utility>
@@ -30,9 +31,13 @@ public:
         content->setFrame(place->bounds());
         place->addSubview(content);
         _screen->didMoveToParentViewController(shared_from_this());
+        coverBy(place);
         ui::LayoutConstraint::activate(
             {place->heightAnchor().equalToConstant(DocumentPeek::miniatureHeight)});
     }
+
+    /// Called when the miniature is tapped.
+    void setOnTap(std::function<void()> onTap) { _onTap = std::move(onTap); }
 
     /// Lets the screen go, so that it can be shown elsewhere.
     void release()
@@ -43,6 +48,22 @@ public:
     }
 
 private:
+    /// A pane that takes the taps, so that a miniature opens as a whole.
+    void coverBy(const std::shared_ptr<ui::View>& place)
+    {
+        const auto pane = std::make_shared<ui::View>();
+        pane->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
+        pane->setFrame(place->bounds());
+        pane->setAccessibility({.label = {}, .hint = {}, .isHidden = true});
+        pane->addGestureRecognizer(std::make_shared<ui::TapRecognizer>([weak = weak_from_this()](Point) {
+            const auto self = std::static_pointer_cast<Miniature>(weak.lock());
+            if (self && self->_onTap)
+                self->_onTap();
+        }));
+        place->addSubview(pane);
+    }
+
+    std::function<void()> _onTap;
     std::shared_ptr<ui::ViewController> _screen;
 };
 
@@ -75,6 +96,10 @@ std::shared_ptr<ui::AlertController> DocumentPeek::make(const std::string& title
     for (const auto& action : actions)
         peek->addAction(asAlertAction(action));
     peek->addAction(std::make_shared<ui::AlertAction>(localized("Cancel"), ui::AlertActionStyle::Cancel));
+    miniature->setOnTap([weak = std::weak_ptr(peek), opening] {
+        if (const auto shown = weak.lock())
+            shown->press(opening);
+    });
     peek->setContentViewController(miniature);
     return peek;
 }

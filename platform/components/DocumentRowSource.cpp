@@ -4,6 +4,7 @@
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"
 #include "platform/components/DisplayName.h"
+#include "platform/components/RowThumbnail.h"
 #include "platform/ui/ListView.h"
 
 #include <utility>
@@ -14,20 +15,39 @@ namespace {
 
 constexpr const char* folderIcon = "folder";
 constexpr const char* plainDocumentIcon = "text-x-generic";
+constexpr const char* linkIcon = "emblem-symbolic-link";
 
 bool opensAsFolder(FolderEntryKind kind)
 {
     return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
 }
 
-std::string spokenDescription(const ui::ListRow& row, const std::vector<std::string>& tagNames)
+/// What kind of item a row stands for, to be said beside its name.
+std::string spokenKind(const FolderEntry& entry)
+{
+    if (entry.kind == FolderEntryKind::Library)
+        return localized("App library");
+    if (entry.kind == FolderEntryKind::Folder)
+        return localized("Folder");
+    if (entry.kind == FolderEntryKind::Link)
+        return {}; // the details say so
+    const auto& types = services().typeRegistry();
+    const auto type = types.typeForExtension(nameExtension(entry.name));
+    return type ? types.description(*type).value_or(std::string()) : std::string();
+}
+
+std::string spokenDescription(
+    const ui::ListRow& row, const FolderEntry& entry, const std::vector<std::string>& tagNames)
 {
     std::string spoken = row.title;
     const auto add = [&spoken](const std::string& part) {
         if (!part.empty())
             spoken += ", " + part;
     };
+    add(spokenKind(entry));
     add(row.detail);
+    if (row.download == ui::DownloadState::Downloading)
+        add(localized("Downloading"));
     if (row.download == ui::DownloadState::InCloud)
         add(localized("In the cloud"));
     for (const auto& name : tagNames)
@@ -40,10 +60,20 @@ std::string spokenDescription(const ui::ListRow& row, const std::vector<std::str
 std::shared_ptr<DocumentRowSource> DocumentRowSource::create(const std::shared_ptr<ui::ListView>& list)
 {
     const auto source = std::make_shared<DocumentRowSource>(list);
-    source->_loader =
-        RowDetailsLoader::create([weak = std::weak_ptr(source)](ui::RowId id, RowDetails details) {
+    const std::weak_ptr weak = source;
+    source->_loader = std::make_shared<Loader>(
+        "row details", QualityOfService::UserInitiated,
+        [](const RowRequest& request) { return readRowDetails(request.url, request.kind); },
+        [weak](ui::RowId id, RowDetails details) {
             if (const auto self = weak.lock())
                 self->detailsArrived(id, std::move(details));
+        });
+    source->_thumbnails = std::make_shared<ThumbnailLoader>(
+        "row thumbnails", QualityOfService::Utility,
+        [](const RowRequest& request) { return readRowThumbnail(request.url); },
+        [weak](ui::RowId id, std::optional<Image> thumbnail) {
+            if (const auto self = weak.lock())
+                self->thumbnailArrived(id, std::move(thumbnail));
         });
     return source;
 }
@@ -82,10 +112,12 @@ ui::ListRow DocumentRowSource::rowAtIndex(const ui::ListView&, std::size_t index
     const bool isKnown = known != _known.end();
     if (isKnown)
         complete(row, known->second.details);
+    if (isKnown && known->second.thumbnail)
+        row.image = known->second.thumbnail;
     if (_places)
         row.detail = _places(_rows->url(index)) + (row.detail.empty() ? "" : " · " + row.detail);
     row.accessibleDescription =
-        spokenDescription(row, isKnown ? known->second.details.tagNames : std::vector<std::string>());
+        spokenDescription(row, entry, isKnown ? known->second.details.tagNames : std::vector<std::string>());
     return row;
 }
 
@@ -104,6 +136,8 @@ Image DocumentRowSource::iconFor(std::size_t index, const FolderEntry& entry) co
 {
     if (const auto* extra = _rows->extraItem(index); extra && !extra->iconName.empty())
         return Image::named(extra->iconName);
+    if (entry.kind == FolderEntryKind::Link && nameExtension(entry.name).empty())
+        return Image::named(linkIcon);
     return Image::named(opensAsFolder(entry.kind) ? folderIcon : documentIcon(entry.name));
 }
 
@@ -124,7 +158,7 @@ void DocumentRowSource::visibleRowsDidChange()
     const auto list = _list.lock();
     if (!list || !_rows)
         return;
-    std::vector<RowDetailsLoader::Request> requests;
+    std::vector<RowRequest> requests;
     const auto range = list->visibleRows();
     for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {
         const auto id = _rows->ids()[row];
@@ -134,6 +168,37 @@ void DocumentRowSource::visibleRowsDidChange()
     }
     _loader->setWanted(requests);
     forgetDetailsOutside(range);
+    fetchThumbnails();
+}
+
+void DocumentRowSource::fetchThumbnails()
+{
+    const auto list = _list.lock();
+    if (!list || !_rows)
+        return;
+    std::vector<RowRequest> requests;
+    const auto range = list->visibleRows();
+    for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {
+        const auto id = _rows->ids()[row];
+        const auto known = _known.find(id);
+        const bool isMissing = known != _known.end() && known->second.details.modified
+            && known->second.details.modified != known->second.thumbnailOf;
+        if (isMissing)
+            requests.push_back({id, _rows->url(row), _rows->entry(row).kind});
+    }
+    _thumbnails->setWanted(requests);
+}
+
+void DocumentRowSource::thumbnailArrived(ui::RowId id, std::optional<Image> thumbnail)
+{
+    const auto known = _known.find(id);
+    if (known == _known.end())
+        return;
+    const bool isNews = thumbnail || known->second.thumbnail;
+    known->second.thumbnail = std::move(thumbnail);
+    known->second.thumbnailOf = known->second.details.modified;
+    if (isNews)
+        tellIfVisible(id);
 }
 
 void DocumentRowSource::invalidateDetails()
@@ -145,11 +210,19 @@ void DocumentRowSource::invalidateDetails()
 
 void DocumentRowSource::detailsArrived(ui::RowId id, RowDetails details)
 {
-    const auto known = _known.find(id);
-    const bool isNews = known == _known.end() || !(known->second.details == details);
-    _known.insert_or_assign(id, Known{std::move(details)});
+    auto& known = _known[id];
+    const bool isNews = known.isNew || !(known.details == details);
+    known.details = std::move(details);
+    known.isStale = known.isNew = false;
+    if (isNews)
+        tellIfVisible(id);
+    fetchThumbnails();
+}
+
+void DocumentRowSource::tellIfVisible(ui::RowId id) const
+{
     const auto list = _list.lock();
-    if (!isNews || !list)
+    if (!list)
         return;
     const auto range = list->visibleRows();
     for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {

@@ -2,7 +2,8 @@
 
 #include "platform/Color.h"
 #include "platform/components/DocumentRows.h"
-#include "platform/components/RowDetailsLoader.h"
+#include "platform/components/RowDetails.h"
+#include "platform/components/VisibleRowLoader.h"
 #include "platform/ui/ListViewDataSource.h"
 
 #include <functional>
@@ -26,7 +27,7 @@ public:
     using TagColors = std::function<std::vector<Color>(const std::vector<std::string>& names)>;
 
     /// Details of this many rows are kept; beyond, those that are not visible go.
-    static constexpr std::size_t keptDetails = 2000;
+    static constexpr std::size_t keptDetails = 600;
 
     static std::shared_ptr<DocumentRowSource> create(const std::shared_ptr<ui::ListView>& list);
     explicit DocumentRowSource(const std::shared_ptr<ui::ListView>& list);
@@ -54,11 +55,18 @@ public:
 
 private:
     struct Known {
-        RowDetails details;
-        bool isStale = false;
+        RowDetails details{};
+        bool isNew = true, isStale = false;
+        std::optional<Image> thumbnail{};
+        std::optional<Date> thumbnailOf{}; ///< the version that a thumbnail was looked for
     };
+    using Loader = VisibleRowLoader<RowDetails>;
+    using ThumbnailLoader = VisibleRowLoader<std::optional<Image>>;
 
     void detailsArrived(ui::RowId id, RowDetails details);
+    void thumbnailArrived(ui::RowId id, std::optional<Image> thumbnail);
+    void fetchThumbnails();
+    void tellIfVisible(ui::RowId id) const;
     void forgetDetailsOutside(const ui::RowRange& range);
     void complete(ui::ListRow& row, const RowDetails& details) const;
     Image iconFor(std::size_t index, const FolderEntry& entry) const;
@@ -66,7 +74,8 @@ private:
 
     std::weak_ptr<ui::ListView> _list;
     std::shared_ptr<const DocumentRows> _rows;
-    std::shared_ptr<RowDetailsLoader> _loader;
+    std::shared_ptr<Loader> _loader;
+    std::shared_ptr<ThumbnailLoader> _thumbnails;
     TagColors _tagColors;
     Places _places;
     std::unordered_map<ui::RowId, Known> _known;

@@ -69,6 +69,8 @@ void describe(RowDetails& details, const Url& url, FolderEntryKind kind, const A
     const auto* status = values.get<DownloadingStatus>(AttributeKey::DownloadingStatus);
     if (status && *status == DownloadingStatus::NotDownloaded)
         details.download = ui::DownloadState::InCloud;
+    if (kind == FolderEntryKind::Document && details.download == ui::DownloadState::Present)
+        details.modified = values.optional<Date>(AttributeKey::ContentModificationDate);
 }
 
 } // namespace

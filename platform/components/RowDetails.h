@@ -1,5 +1,6 @@
 #pragma once
 
+#include "platform/Date.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
 #include "platform/ui/ListRow.h"
@@ -16,6 +17,7 @@ struct RowDetails {
     std::string text; ///< date and size, or date and number of items, and whether it is shared
     ui::DownloadState download = ui::DownloadState::Present;
     std::vector<std::string> tagNames;
+    std::optional<Date> modified; ///< a document that is here: its thumbnail is of this version
 
     bool operator==(const RowDetails&) const = default;
 };

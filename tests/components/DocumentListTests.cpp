@@ -5,6 +5,7 @@
 #include "platform/Localization.h"
 #include "platform/components/FolderPlaces.h"
 #include "platform/components/PlaceholderView.h"
+#include "platform/components/RowThumbnail.h"
 #include "platform/components/UnavailableScreen.h"
 #include "platform/ui/AlertController.h"
 #include "platform/ui/ListView.h"
@@ -135,6 +136,60 @@ TEST_F(DocumentList, ShowsTheLibrariesAtTheTopOfTheDrive)
     drive.signOut();
     drive.settle();
     EXPECT_FALSE(DocumentListController::createRootList());
+}
+
+TEST_F(DocumentList, ShowsLibrariesThatComeWhileItIsShown)
+{
+    const auto root = DocumentListController::createRootList();
+    const auto list = shownList(*root->presentedURL());
+    deliver(list, {{"Documents", Kind::Folder}});
+    list->setEditingAnimated(true, false);
+    list->setSelectedItems({drive.url("Documents")});
+    EXPECT_EQ(titles(list), (Lines{"Documents"}));
+    makePaintLibrary(drive);
+    lister->deliver(root->presentedURL()->deletingLastPathComponent(), {});
+    deliver(list, {{"Documents", Kind::Folder}});
+    EXPECT_EQ(titles(list), (Lines{"Paint", "Documents"}));
+    EXPECT_EQ(list->selectedItems(), std::vector{drive.url("Documents")});
+    const auto listings = lister->listingsStarted();
+    lister->deliver(root->presentedURL()->deletingLastPathComponent(), {});
+    drive.dispatch->advance(2);
+    EXPECT_EQ(lister->listingsStarted(), listings) << "nothing changed";
+}
+
+TEST_F(DocumentList, ShowsThumbnailsOfPicturesAndMakesThemAnewWhenTheyChange)
+{
+    const auto writePicture = [&](int width, int height, unsigned char shade) {
+        std::string picture = "P5 " + std::to_string(width) + ' ' + std::to_string(height) + " 255\n";
+        picture.append(static_cast<std::size_t>(width * height), static_cast<char>(shade));
+        const auto url = drive.writeDocument("Stuff/photo.pgm", picture);
+        std::filesystem::last_write_time(
+            url.path(), std::filesystem::file_time_type{std::chrono::hours(shade)});
+        // Asked on the main thread, as here, the store makes a thumbnail later and has it from then on.
+        readRowThumbnail(url);
+        drive.dispatch->runUntilIdle();
+    };
+    writePicture(400, 200, 0x40);
+    drive.writeDocument("Stuff/broken.pgm", "no picture");
+    const auto list = shownList(drive.url("Stuff"));
+    const HandLister::Entries entries{{"broken.pgm"}, {"photo.pgm"}, {"To", Kind::Link}};
+    deliver(list, entries);
+    EXPECT_TRUE(list->listView()->row(0).image->isNamed());
+    EXPECT_EQ(list->listView()->row(2).image, Image::named("emblem-symbolic-link"));
+    const auto first = *list->listView()->row(1).image;
+    ASSERT_FALSE(first.isNamed());
+    EXPECT_EQ(first.pixelWidth(), rowThumbnailSide);
+    EXPECT_EQ(first.pixelHeight(), rowThumbnailSide / 2);
+    EXPECT_EQ(first.pixels().front(), 0xff404040U);
+
+    deliver(list, entries);
+    EXPECT_EQ(list->listView()->row(1).image, first) << "not made again while nothing changed";
+
+    writePicture(30, 60, 0x80);
+    deliver(list, entries);
+    const auto second = *list->listView()->row(1).image;
+    EXPECT_EQ(second.pixelHeight(), 60);
+    EXPECT_EQ(second.pixels().back(), 0xff808080U);
 }
 
 TEST_F(DocumentList, ReportsWhatIsTapped)

@@ -1,0 +1,138 @@
+#pragma once
+
+#include "platform/Dispatch.h"
+#include "platform/FolderSnapshot.h"
+#include "platform/Services.h"
+#include "platform/Url.h"
+#include "platform/ui/ListRow.h"
+
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <mutex>
+#include <unordered_map>
+#include <utility>
+#include <vector>
+
+namespace platform::components {
+
+/// A row that something is to be read for.
+struct RowRequest {
+    ui::RowId id;
+    Url url;
+    FolderEntryKind kind;
+};
+
+/// Reads something for the rows that are on the screen, off the main thread. What is no longer wanted when
+/// its turn comes is skipped; what arrives too late is dropped. Main thread only.
+template <typename Value>
+class VisibleRowLoader : public std::enable_shared_from_this<VisibleRowLoader<Value>> {
+public:
+    using Read = std::function<Value(const RowRequest&)>; ///< called on threads of a queue
+    /// Called on the main thread, once for each row that is still wanted.
+    using Arrived = std::function<void(ui::RowId, Value)>;
+
+    VisibleRowLoader(std::string name, QualityOfService quality, Read read, Arrived arrived)
+        : _shared(std::make_shared<Shared>())
+        , _arrived(std::move(arrived))
+        , _queue(services().dispatch().makeOperationQueue(std::move(name), quality))
+    {
+        _shared->read = std::move(read);
+    }
+
+    /// The rows that still lack their value: others are not wanted any more.
+    void setWanted(const std::vector<RowRequest>& requests)
+    {
+        std::unordered_map<ui::RowId, Ticket> wanted;
+        std::vector<std::pair<const RowRequest*, Ticket>> added;
+        const std::lock_guard lock(_shared->mutex);
+        for (const auto& request : requests) {
+            const auto known = _shared->wanted.find(request.id);
+            const bool isNew = known == _shared->wanted.end();
+            const auto ticket = isNew ? _nextTicket++ : known->second;
+            if (wanted.emplace(request.id, ticket).second && isNew)
+                added.emplace_back(&request, ticket);
+        }
+        _shared->wanted = std::move(wanted);
+        for (const auto& [request, ticket] : added)
+            fetch(*request, ticket);
+    }
+
+    /// Forgets what is under way, so that the next `setWanted` reads everything again.
+    void cancelAll()
+    {
+        const std::lock_guard lock(_shared->mutex);
+        _shared->wanted.clear();
+    }
+
+private:
+    using Ticket = std::uint64_t;
+    struct Found {
+        ui::RowId id;
+        Ticket ticket;
+        Value value;
+    };
+    /// What the workers see.
+    struct Shared {
+        std::mutex mutex;
+        Read read;
+        std::unordered_map<ui::RowId, Ticket> wanted;
+        std::vector<Found> found;
+        bool isDeliveryPosted = false;
+
+        bool isWanted(ui::RowId id, Ticket ticket)
+        {
+            const std::lock_guard lock(mutex);
+            const auto known = wanted.find(id);
+            return known != wanted.end() && known->second == ticket;
+        }
+        // Whether a delivery has to be posted: what is found in the meantime goes with the one that waits.
+        bool keep(Found value)
+        {
+            const std::lock_guard lock(mutex);
+            found.push_back(std::move(value));
+            return !std::exchange(isDeliveryPosted, true);
+        }
+        std::vector<Found> take()
+        {
+            const std::lock_guard lock(mutex);
+            isDeliveryPosted = false;
+            std::vector<Found> arrived;
+            for (auto& value : std::exchange(found, {})) {
+                const auto known = wanted.find(value.id);
+                if (known == wanted.end() || known->second != value.ticket)
+                    continue;
+                wanted.erase(known);
+                arrived.push_back(std::move(value));
+            }
+            return arrived;
+        }
+    };
+
+    void fetch(const RowRequest& request, Ticket ticket)
+    {
+        const auto main = services().dispatch().mainQueue();
+        _queue->addOperation([weak = this->weak_from_this(), shared = _shared, request, ticket, main] {
+            if (!shared->isWanted(request.id, ticket)
+                || !shared->keep({request.id, ticket, shared->read(request)}))
+                return;
+            main->async([weak] {
+                if (const auto self = weak.lock())
+                    self->deliver();
+            });
+        });
+    }
+
+    void deliver()
+    {
+        for (auto& found : _shared->take())
+            _arrived(found.id, std::move(found.value));
+    }
+
+    std::shared_ptr<Shared> _shared;
+    Arrived _arrived;
+    std::shared_ptr<OperationQueue> _queue;
+    Ticket _nextTicket = 1;
+};
+
+} // namespace platform::components
