@@ -23,6 +23,8 @@ std::string errorWords(const Error& error)
         return localized("It is no longer there.");
     if (error.domain() == errorDomain::system && (error.code() == EACCES || error.code() == EPERM))
         return localized("You do not have permission to see it.");
+    if (error.domain() == errorDomain::system && (error.code() == ENOSPC || error.code() == EDQUOT))
+        return localized("There is not enough space on this computer.");
     if (error.domain() == errorDomain::image && error.code() == static_cast<int>(ImageErrorCode::TooLarge))
         return localized("The picture is too large to be shown here.");
     if (error.domain() == errorDomain::image)

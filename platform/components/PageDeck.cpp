@@ -149,11 +149,27 @@ std::optional<PageDeck::Task> PageDeck::nextTask(const Rect& visible) const
     if (const auto task = detailTask(visible))
         return task;
     // The neighbours, so that turning the page shows it at once.
-    if (seen.end < _pages.size()) {
-        if (const auto task = missing(seen.end))
+    const PageRange near{seen.first > 0 ? seen.first - 1 : 0, std::min(seen.end + 1, _pages.size())};
+    for (const auto page : {near.end - 1, near.first}) {
+        const auto task = _pages.empty() ? std::nullopt : missing(page);
+        if (task && hasRoomFor(*task, near))
             return task;
     }
-    return seen.first > 0 ? missing(seen.first - 1) : std::nullopt;
+    return std::nullopt;
+}
+
+/// Whether a neighbour can be kept: it would be drawn again and again otherwise.
+bool PageDeck::hasRoomFor(const Task& task, const PageRange& near) const
+{
+    double bytes = task.part.width * task.part.height * task.pixelsPerPoint * task.pixelsPerPoint * 4;
+    for (auto page = near.first; page < near.end; ++page) {
+        const auto kept = _kept.find(page);
+        if (page != task.page && kept != _kept.end())
+            bytes += static_cast<double>(bytesOf(kept->second.picture));
+    }
+    // Sides are rounded to whole pixels.
+    constexpr double roughly = 0.95;
+    return bytes < roughly * static_cast<double>(maxPictureBytes);
 }
 
 Rect PageDeck::visiblePart(std::size_t page, const Rect& visible) const

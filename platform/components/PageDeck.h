@@ -75,6 +75,7 @@ private:
     double fullPixelsPerPoint() const { return pointsPerPagePoint() * _scale; }
     std::optional<Task> detailTask(const Rect& visible) const;
     Rect visiblePart(std::size_t page, const Rect& visible) const;
+    bool hasRoomFor(const Task& task, const PageRange& near) const;
     void evict(const Rect& visible);
 
     std::vector<Size> _pages;

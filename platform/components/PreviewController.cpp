@@ -1,6 +1,7 @@
 #include "platform/components/PreviewController.h"
 
 #include "platform/Dispatch.h"
+#include "platform/ItemDownload.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/components/DisplayName.h"
@@ -11,6 +12,7 @@
 #include "platform/components/PreviewSummaryView.h"
 #include "platform/components/PreviewToolbar.h"
 #include "platform/components/PreviewViews.h"
+#include "platform/ui/Button.h"
 #include "platform/ui/NavigationController.h"
 #include "platform/ui/NavigationItem.h"
 #include "platform/ui/TextField.h"
@@ -104,6 +106,13 @@ void PreviewController::viewWillAppear(bool animated)
     }
 }
 
+void PreviewController::viewDidAppear(bool animated)
+{
+    ViewController::viewDidAppear(animated);
+    if (_content)
+        startDownload();
+}
+
 void PreviewController::viewDidDisappear(bool animated)
 {
     ViewController::viewDidDisappear(animated);
@@ -112,6 +121,7 @@ void PreviewController::viewDidDisappear(bool animated)
     if (navigationController())
         return;
     cancelLoad();
+    leaveDownload();
     forgetContent();
 }
 
@@ -129,6 +139,7 @@ void PreviewController::reloadData()
     const bool hasItem = source && source->numberOfPreviewItemsInPreviewController(*this) > 0;
     _item = hasItem ? std::optional(source->previewControllerPreviewItemAtIndex(*this, 0)) : std::nullopt;
     cancelLoad();
+    leaveDownload();
     forgetContent();
     setTitle(_item ? displayName(_item->lastPathComponent()) : std::string());
     if (!_item)
@@ -208,8 +219,11 @@ void PreviewController::showContent()
         return;
     if (const auto preview = previewViewFor(*_content, _previewView))
         showPreview(preview);
-    else
+    else if (!_download)
         showSummary();
+    // Who only had a glimpse at it has not asked for it.
+    if (appearanceState() == ui::AppearanceState::Appeared)
+        startDownload();
 }
 
 void PreviewController::showPreview(const std::shared_ptr<PreviewView>& preview)
@@ -261,25 +275,40 @@ void PreviewController::previewFailed(const std::string& words)
     show(std::make_shared<const PreviewContent>(std::move(failure)));
 }
 
+std::function<void()> PreviewController::calling(void (PreviewController::*action)())
+{
+    return [weak = std::weak_ptr(self()), action] {
+        if (const auto screen = weak.lock())
+            ((*screen).*action)();
+    };
+}
+
 void PreviewController::showSummary()
 {
-    const auto view =
+    _summary =
         summaryView({.iconName = _content->iconName, .title = _content->title, .message = _content->note});
     std::vector<PreviewSummaryView::Action> actions;
-    const std::weak_ptr<PreviewController> weak = self();
-    if (_openIn && _content->kind != PreviewContent::Kind::InCloud)
-        actions.push_back({localized("Open in…"),
-            [weak, from = std::weak_ptr<ui::View>(view)] {
-                const auto screen = weak.lock();
-                if (screen && screen->_item && screen->_openIn)
-                    screen->_openIn(*screen->_item, from.lock());
-            },
-            true});
-    view->setActions(actions);
+    if (_content->kind == PreviewContent::Kind::InCloud)
+        actions.push_back({localized("Download"), calling(&PreviewController::startAgain), true});
+    else if (_content->canRetry)
+        actions.push_back({localized("Try Again"), calling(&PreviewController::startAgain), true});
+    else if (_openIn)
+        actions.push_back({localized("Open in…"), calling(&PreviewController::openIn), true});
+    _summary->setActions(actions);
     _screen->setSearching(false);
     _screen->setNote({});
-    _screen->setContent(view);
+    _screen->setContent(_summary);
     connectPreview();
+}
+
+void PreviewController::openIn()
+{
+    if (!_item || !_openIn)
+        return;
+    std::shared_ptr<ui::View> from = view();
+    if (_summary && !_summary->buttons().empty())
+        from = _summary->buttons().front();
+    _openIn(*_item, from);
 }
 
 void PreviewController::showNothing()

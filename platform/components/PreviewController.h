@@ -1,5 +1,6 @@
 #pragma once
 
+#include "platform/Error.h"
 #include "platform/Url.h"
 #include "platform/components/PreviewControllerProtocols.h"
 #include "platform/ui/BarButtonItem.h"
@@ -11,12 +12,15 @@
 #include <optional>
 
 namespace platform {
+class ItemDownload;
 class OperationQueue;
+struct DownloadProgress;
 } // namespace platform
 
 namespace platform::components {
 
 class PreviewScreenView;
+class PreviewSummaryView;
 class PreviewView;
 struct PreviewContent;
 struct PreviewLimits;
@@ -51,6 +55,7 @@ public:
     void loadView() override;
     void viewDidLoad() override;
     void viewWillAppear(bool animated) override;
+    void viewDidAppear(bool animated) override;
     void viewDidDisappear(bool animated) override;
     bool backRequested() override;
 
@@ -63,6 +68,10 @@ public:
     void beginSearch();
     void endSearch();
 
+    bool isDownloading() const { return _download != nullptr; }
+    void startDownload();
+    void cancelDownload();
+
 private:
     using Token = std::shared_ptr<std::atomic<bool>>; ///< true: the load is no longer wanted
 
@@ -72,6 +81,12 @@ private:
     void showContent();
     void showPreview(const std::shared_ptr<PreviewView>& preview);
     void showSummary();
+    void showDownload(const DownloadProgress& progress);
+    void downloadEnded(const std::optional<Error>& error);
+    void leaveDownload();
+    void startAgain();
+    void openIn();
+    std::function<void()> calling(void (PreviewController::*action)());
     void showNothing();
     void showLoadingAfterDelay();
     void forgetContent();
@@ -87,6 +102,9 @@ private:
     std::shared_ptr<const PreviewContent> _content;
     std::shared_ptr<PreviewScreenView> _screen;
     std::shared_ptr<PreviewView> _previewView; ///< kept while a failure is shown, for the place in it
+    std::shared_ptr<PreviewSummaryView> _summary; ///< what is shown in place of content
+    std::unique_ptr<ItemDownload> _download;
+    bool _isDownloadWanted = true; ///< false once the person has stopped it
     ui::BarButtonItems _additionalItems;
     std::shared_ptr<OperationQueue> _queue;
     Token _cancelled;

@@ -57,6 +57,7 @@ void PreviewPagesView::setDocument(std::shared_ptr<PagedDocument> document, Size
     }
     _deck.forgetPictures();
     _deck.setPages(std::move(pages));
+    _currentPage = _deck.currentPage(_visible);
     _selection.clear();
     readPageSizes();
     if (!query().empty())

@@ -3,11 +3,15 @@
 #include "platform/components/PreviewLoader.h"
 #include "platform/components/PreviewPictureView.h"
 #include "platform/components/PreviewScreenView.h"
+#include "platform/components/PreviewSearchBar.h"
 #include "platform/components/PreviewSummaryView.h"
 #include "platform/components/PreviewTextView.h"
 #include "platform/components/PreviewToolbar.h"
 #include "platform/components/TextDecoding.h"
+#include "platform/ui/Button.h"
+#include "platform/ui/Label.h"
 #include "platform/ui/Screen.h"
+#include "platform/ui/TextField.h"
 #include "tests/components/support/ComponentsFixture.h"
 #include "tests/support/SimplePdf.h"
 
@@ -15,6 +19,7 @@
 #include <sys/stat.h>
 
 #include <filesystem>
+#include <fstream>
 
 using namespace platform;
 using namespace platform::components;
@@ -199,6 +204,165 @@ TEST_F(Preview, ShowsThatItIsLoadingOnlyAfterAWhile)
     EXPECT_EQ(text->text().text, "Hello");
     drive.dispatch->advance(1);
     EXPECT_EQ(late->screenView()->content(), text);
+}
+
+/// The buttons that are offered below what the screen says.
+std::vector<std::string> offers(const PreviewController& screen)
+{
+    std::vector<std::string> titles;
+    const auto view = std::dynamic_pointer_cast<PreviewSummaryView>(screen.screenView()->content());
+    for (const auto& button : view ? view->buttons() : std::vector<std::shared_ptr<ui::Button>>())
+        titles.push_back(button->title());
+    return titles;
+}
+
+void press(const PreviewController& screen)
+{
+    const auto view = std::dynamic_pointer_cast<PreviewSummaryView>(screen.screenView()->content());
+    const auto button = view->buttons().front();
+    button->press();
+}
+
+class Download : public Preview {
+protected:
+    Download()
+    {
+        host::drive::PromiseRecord promise;
+        promise.size = 5;
+        promise.content = "content";
+        far = drive.writePromise("Far.txt", promise);
+        std::filesystem::create_directories(drive.layout().cloud());
+    }
+    void putContent() const { std::ofstream(drive.layout().cloud() + "/content") << "Hello"; }
+    void appear() const
+    {
+        screen->beginAppearance(true, false);
+        screen->endAppearance();
+    }
+    std::optional<Url> far;
+};
+
+TEST_F(Download, BeginsWhenThePersonHasComeToTheDocument)
+{
+    putContent();
+    show({*far});
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->kind, Kind::InCloud);
+    EXPECT_THAT(offers(*screen), testing::ElementsAre("Download"));
+
+    appear();
+    EXPECT_TRUE(screen->isDownloading());
+    EXPECT_THAT(summary().message, HasSubstr("Downloading"));
+    EXPECT_THAT(offers(*screen), testing::ElementsAre("Cancel"));
+    drive.dispatch->runUntilIdle();
+    EXPECT_FALSE(screen->isDownloading());
+    EXPECT_EQ(screen->content()->text, "Hello");
+}
+
+TEST_F(Download, CanBeStoppedAndBegunAgain)
+{
+    putContent();
+    show({*far});
+    drive.dispatch->runUntilIdle();
+    appear();
+    press(*screen);
+    drive.dispatch->runUntilIdle();
+    EXPECT_FALSE(std::filesystem::exists(far->path()));
+    EXPECT_THAT(summary().message, HasSubstr("in the cloud"));
+    // A change that is heard of does not begin what was stopped.
+    screen->refreshCurrentPreviewItem();
+    drive.dispatch->runUntilIdle();
+    EXPECT_FALSE(screen->isDownloading());
+    press(*screen);
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->kind, Kind::Text);
+}
+
+TEST_F(Download, SaysWhyItFailedAndTriesAgain)
+{
+    show({*far});
+    appear();
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->kind, Kind::Failure);
+    EXPECT_THAT(summary().message, HasSubstr("could not be downloaded"));
+    EXPECT_THAT(offers(*screen), testing::ElementsAre("Try Again"));
+    putContent();
+    press(*screen);
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->text, "Hello");
+}
+
+TEST_F(Download, EndsWhenTheScreenIsLeft)
+{
+    putContent();
+    show({*far});
+    drive.dispatch->runUntilIdle();
+    appear();
+    screen->beginAppearance(false, false);
+    screen->endAppearance();
+    drive.dispatch->runUntilIdle();
+    EXPECT_FALSE(std::filesystem::exists(far->path()));
+    EXPECT_FALSE(screen->content());
+    // Whoever comes back sees it again.
+    appear();
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->text, "Hello");
+}
+
+TEST_F(Preview, OffersToOpenElsewhereWhatItCannotShow)
+{
+    show({drive.writeDocument("Data.bin", "bytes")});
+    drive.dispatch->runUntilIdle();
+    EXPECT_TRUE(offers(*screen).empty());
+    std::vector<Url> opened;
+    screen->setOpenInHandler([&](const Url& item, const auto& from) {
+        EXPECT_TRUE(from);
+        opened.push_back(item);
+    });
+    ASSERT_THAT(offers(*screen), testing::ElementsAre("Open in…"));
+    press(*screen);
+    EXPECT_EQ(opened, std::vector<Url>{drive.url("Data.bin")});
+}
+
+TEST_F(Preview, KeepsTheViewWhileADocumentIsDamagedForAWhile)
+{
+    const auto url = drive.writeDocument("Plan.pdf", testing_support::simplePdf({"one", "two"}));
+    show({url});
+    drive.dispatch->runUntilIdle();
+    const auto view = screen->previewView();
+    view->setZoom(3);
+    drive.writeDocument("Plan.pdf", "%PDF");
+    screen->refreshCurrentPreviewItem();
+    drive.dispatch->runUntilIdle();
+    EXPECT_THAT(summary().message, HasSubstr("damaged"));
+    EXPECT_TRUE(screen->screenView()->toolbar()->isHidden());
+    drive.writeDocument("Plan.pdf", testing_support::simplePdf({"one", "two", "three"}));
+    screen->refreshCurrentPreviewItem();
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->screenView()->content(), view);
+    EXPECT_EQ(view->zoom(), 3);
+    EXPECT_EQ(screen->screenView()->toolbar()->pageLabel()->text(), "1 of 3");
+}
+
+TEST_F(Preview, SearchesFromItsBar)
+{
+    show({drive.writeDocument("Plan.pdf", testing_support::simplePdf({"hay", "needle"}))});
+    drive.dispatch->runUntilIdle();
+    screen->view()->layoutIfNeeded();
+    const auto& bars = *screen->screenView();
+    ASSERT_TRUE(bars.toolbar()->findButton()->press());
+    EXPECT_TRUE(bars.isSearching());
+    EXPECT_FALSE(bars.searchBar()->nextButton()->press());
+    bars.searchBar()->field()->userEdited("need", {4, 0});
+    bars.searchBar()->field()->userEdited("needle", {6, 0});
+    drive.dispatch->advance(1);
+    EXPECT_EQ(bars.searchBar()->countLabel()->text(), "1 of 1");
+    EXPECT_TRUE(bars.searchBar()->nextButton()->press());
+    // The back key leaves the search first, then the screen.
+    EXPECT_TRUE(screen->backRequested());
+    EXPECT_FALSE(bars.isSearching());
+    EXPECT_EQ(screen->previewView()->query(), "");
+    EXPECT_FALSE(screen->backRequested());
 }
 
 struct TextRow {
