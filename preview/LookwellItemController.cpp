@@ -5,6 +5,7 @@
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"
 #include "preview/PreviewItemManager.h"
+#include "preview/TarrowDriveAppPreview.h"
 
 namespace tarrow {
 
@@ -110,6 +111,12 @@ bool LookwellItemController::previewControllerCanEditItem(const PreviewControlle
 bool LookwellItemController::previewControllerShouldSaveEditedItem(const PreviewController&, const Url& item)
 {
     return _lwPreviewItemIsPDFKind(item);
+}
+
+bool LookwellItemController::previewControllerWantsDefaultMediaPlayer(
+    const PreviewController&, const Url& item)
+{
+    return wantsDefaultMediaPlayer(item);
 }
 
 } // namespace tarrow

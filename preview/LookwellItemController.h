@@ -56,6 +56,9 @@ private:
     bool previewControllerShouldSaveEditedItem(
         const platform::components::PreviewController& controller, const platform::Url& item) override;
 
+    bool previewControllerWantsDefaultMediaPlayer(
+        const platform::components::PreviewController& controller, const platform::Url& item) override;
+
     std::weak_ptr<PreviewItemManager> _itemManager;
     std::optional<std::vector<platform::Url>> _arrayOfDocuments;
     platform::ui::Menu _previewActionItems;

@@ -42,13 +42,29 @@ std::optional<ActivityRecord> readRecord(const std::filesystem::path& path)
     return std::nullopt;
 }
 
-/// What the other devices of the account say, as far as it is recent.
+const std::string* bookmarkOf(const ActivityRecord& record)
+{
+    const auto* value = platform::find(record.activity.userInfo, platform::activityKey::documentURL);
+    return value ? value->get<std::string>() : nullptr;
+}
+
+/// The document that this device shows itself; empty: none.
+std::string ownBookmark(const std::string& path)
+{
+    const auto text = readSmallFile(path, ActivityRecord::maximumFileSize);
+    const auto record = text ? ActivityRecord::parse(*text) : std::nullopt;
+    const auto* bookmark = record ? bookmarkOf(*record) : nullptr;
+    return bookmark ? *bookmark : std::string();
+}
+
+/// What the other devices of the account say, as far as it is recent and not what is shown here already.
 std::vector<ActivityRecord> readRecords(const DriveLayout& layout, Date now)
 {
     const auto account = AccountRecord::read(layout);
     if (!account)
         return {};
     const auto own = ActivityRecord::fileName(DeviceIdentity::identifierAt(layout.device()));
+    const auto shownHere = ownBookmark(layout.activities() + '/' + own);
     std::vector<ActivityRecord> records;
     std::error_code problem;
     std::filesystem::directory_iterator entries(layout.activities(), problem);
@@ -60,16 +76,12 @@ std::vector<ActivityRecord> readRecords(const DriveLayout& layout, Date now)
         if (++seen > LocalActivityHandOver::mostDevices)
             break;
         auto record = readRecord(entries->path());
-        if (record && record->account == account->identity && isRecent(record->time, now))
+        const auto* bookmark = record ? bookmarkOf(*record) : nullptr;
+        if (bookmark && *bookmark != shownHere && record->account == account->identity
+            && isRecent(record->time, now))
             records.push_back(std::move(*record));
     }
     return records;
-}
-
-const std::string* bookmarkOf(const ActivityRecord& record)
-{
-    const auto* value = platform::find(record.activity.userInfo, platform::activityKey::documentURL);
-    return value ? value->get<std::string>() : nullptr;
 }
 
 } // namespace
@@ -152,7 +164,6 @@ void LocalActivityHandOver::recordsRead(Records records)
 {
     ++_reading;
     _found.clear();
-    std::erase_if(records, [](const auto& record) { return !bookmarkOf(record); });
     _undecided = records.size();
     for (const auto& record : records) {
         _cloud->items().decodeBookmark(*bookmarkOf(record),

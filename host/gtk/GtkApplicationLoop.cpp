@@ -1,11 +1,13 @@
 #include "host/gtk/GtkApplicationLoop.h"
 
 #include "host/gtk/BroadwayServer.h"
+#include "host/gtk/HandOverToasts.h"
 #include "host/gtk/RemoteInstance.h"
 #include "platform/Localization.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Services.h"
 #include "platform/UserDefaults.h"
+#include "platform/ui/AlertController.h"
 #include "platform/ui/InterfaceState.h"
 #include "platform/ui/ViewController.h"
 
@@ -137,6 +139,7 @@ GtkApplicationLoop::GtkApplicationLoop(ApplicationSettings settings)
 GtkApplicationLoop::~GtkApplicationLoop()
 {
     _connections.clear();
+    _handOver.reset();
     _delegate.reset();
     _windowHost.reset();
 }
@@ -192,6 +195,7 @@ int GtkApplicationLoop::runPrimary(char** argv, const CommandLine& line)
         return RemoteInstance(_settings.applicationId).forward(line.requests) ? EX_OK : EX_UNAVAILABLE;
     _waiting = line.requests;
     const int status = g_application_run(application, 1, argv);
+    _handOver.reset();
     if (_windowHost)
         _windowHost->close();
     return status;
@@ -289,6 +293,11 @@ void GtkApplicationLoop::windowShown(WindowPeer& window)
 {
     window.setOnActive([this](bool active) { activeChanged(active); });
     window.setOnClosed([this] { resignActive(); });
+    _handOver = HandOverToasts::make(
+        window.toasts(), [this](const UserActivity& activity) { continueActivity(activity); },
+        [this](const UserActivity& activity, const platform::Error& error) {
+            failedToContinue(activity, error);
+        });
 }
 
 void GtkApplicationLoop::handle(const LaunchRequest& request)
@@ -332,6 +341,19 @@ void GtkApplicationLoop::continueActivity(const UserActivity& activity)
         _delegate->applicationContinueUserActivityRestorationHandler(*this, activity, [] {});
     if (auto* window = windowPeer())
         window->show();
+}
+
+void GtkApplicationLoop::failedToContinue(const UserActivity& activity, const platform::Error& error)
+{
+    using namespace platform::ui;
+    _delegate->applicationDidFailToContinueUserActivityWithTypeError(*this, activity.type, error);
+    const auto model = windowPeer() ? windowPeer()->model() : nullptr;
+    if (!model || !model->rootViewController())
+        return;
+    const auto alert = std::make_shared<AlertController>(
+        error.text(platform::errorKey::localizedDescription).value_or(""), "", AlertStyle::Alert);
+    alert->addAction(std::make_shared<AlertAction>(platform::localized("OK"), AlertActionStyle::Default));
+    model->rootViewController()->presentViewController(alert, true);
 }
 
 void GtkApplicationLoop::activeChanged(bool active)

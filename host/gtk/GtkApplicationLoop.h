@@ -14,6 +14,7 @@
 namespace host::gtk {
 
 class BroadwayServer;
+class HandOverToasts;
 
 /// The application's loop on the main thread: one process with one window; later starts hand over to it.
 /// Without a display the window is served to a web browser on this machine.
@@ -41,6 +42,7 @@ private:
     void openUrl(const std::string& url);
     void perform(const platform::ShortcutItem& shortcut);
     void continueActivity(const platform::UserActivity& activity);
+    void failedToContinue(const platform::UserActivity& activity, const platform::Error& error);
     void activeChanged(bool active);
     void resignActive();
     void windowShown(WindowPeer& window);
@@ -50,6 +52,7 @@ private:
     std::unique_ptr<BroadwayServer> _broadway;
     ObjectRef<AdwApplication> _application;
     std::shared_ptr<GtkWindowHost> _windowHost;
+    std::shared_ptr<HandOverToasts> _handOver;
     DelegateFactory _makeDelegate;
     std::shared_ptr<platform::ApplicationDelegate> _delegate; ///< null before the launch
     std::vector<LaunchRequest> _waiting; ///< of the command line, until the launch

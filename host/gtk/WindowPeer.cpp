@@ -62,7 +62,9 @@ void WindowPeer::build(AdwApplication* application, const WindowSize& size)
                              : GTK_WIDGET(g_object_new(ADW_TYPE_APPLICATION_WINDOW, nullptr));
     _window = ObjectRef<GtkWidget>::retain(made);
     _overlay = gtk_overlay_new();
-    _bin->setChild(_overlay);
+    _toasts = ADW_TOAST_OVERLAY(adw_toast_overlay_new());
+    adw_toast_overlay_set_child(_toasts, _overlay);
+    _bin->setChild(GTK_WIDGET(_toasts));
     adw_application_window_set_content(ADW_APPLICATION_WINDOW(made), _bin->widget());
     gtk_window_set_title(window(), platform::localized("Tarrow Drive").c_str());
     gtk_widget_set_size_request(made, minimumWidth, minimumHeight);

@@ -33,6 +33,8 @@ public:
 
     void show();
     GtkWindow* window() const { return GTK_WINDOW(_window.get()); }
+    /// Where short messages show, over everything else.
+    AdwToastOverlay* toasts() const { return _toasts; }
     const std::shared_ptr<PeerContext>& context() const { return _context; }
     ScreenPeer* rootPeer() const { return _root.get(); }
     std::shared_ptr<platform::ui::Window> model() const { return _model.lock(); }
@@ -76,6 +78,7 @@ private:
     std::shared_ptr<PeerContext> _context;
     ObjectRef<GtkWidget> _window;
     std::unique_ptr<SizedBin> _bin;
+    AdwToastOverlay* _toasts = nullptr;
     GtkWidget* _overlay = nullptr;
     std::shared_ptr<ScreenPeer> _root;
     std::vector<Layer> _layers; ///< the topmost last

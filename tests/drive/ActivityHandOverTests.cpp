@@ -123,6 +123,20 @@ TEST_F(HandOver, offersToOtherDevicesWhatIsCurrentAndTakesItBack)
     EXPECT_EQ(changeCount, 3);
 }
 
+TEST_F(HandOver, offersNotWhatIsShownHereAlready)
+{
+    const auto other = makeDevice("other");
+    const auto here = viewing(bookmark("Documents/a.txt"));
+    other->becomeCurrent(viewing(bookmark("Documents/a.txt")));
+    drive.handOver->becomeCurrent(here);
+    settle();
+    EXPECT_EQ(offered(), Names());
+    EXPECT_TRUE(other->offers().empty());
+    drive.handOver->resignCurrent(here);
+    settle();
+    EXPECT_EQ(offered(), Names{"a.txt"});
+}
+
 TEST_F(HandOver, publishesNothingThatOthersMayNotContinue)
 {
     const auto other = makeDevice("other");

@@ -1,12 +1,10 @@
 #include "preview/PreviewItemManager.h"
 
+#include "PreviewFixture.h"
 #include "items/DRItem.h"
 #include "platform/components/PreviewContent.h"
-#include "platform/ui/NavigationController.h"
 #include "platform/ui/SearchPresentation.h"
-#include "platform/ui/Window.h"
 #include "preview/LookwellItemController.h"
-#include "tests/components/support/ComponentsFixture.h"
 
 #include <gmock/gmock.h>
 
@@ -17,42 +15,7 @@ using platform::components::PreviewContent;
 
 namespace {
 
-class Manager : public testing_support::ComponentsFixture {
-protected:
-    Manager()
-    {
-        navigation->setViewControllers({base}, false);
-        window->setRootViewController(navigation);
-        window->makeKeyAndVisible();
-    }
-    ~Manager() override
-    {
-        LookwellItemController::defaultController()->lookwellNewItem(nullptr);
-        manager = nullptr;
-    }
-    std::shared_ptr<DRItem> document(const char* name)
-    {
-        return DRItem::initWithURL(drive.writeDocument(name, "content of " + std::string(name)));
-    }
-    /// The last names of the shown folders, "*" for the preview, "-" for another screen.
-    std::vector<std::string> stack() const
-    {
-        std::vector<std::string> names;
-        for (const auto& screen : navigation->viewControllers()) {
-            const auto list = std::dynamic_pointer_cast<DocumentListController>(screen);
-            names.push_back(list ? list->presentedURL()->lastPathComponent() : screen == preview ? "*" : "-");
-        }
-        return names;
-    }
-
-    std::shared_ptr<ui::NavigationController> navigation = std::make_shared<ui::NavigationController>();
-    std::shared_ptr<ui::ViewController> base = std::make_shared<ui::ViewController>();
-    std::shared_ptr<ui::Window> window = std::make_shared<ui::Window>(Rect{0, 0, 360, 640});
-    std::shared_ptr<PreviewItemManager> manager =
-        PreviewItemManager::newItemManagerWithModeNavController(PreviewModeQuick, navigation);
-    std::shared_ptr<LookwellItemController> preview = LookwellItemController::defaultController();
-};
-
+using Manager = testing_support::PreviewFixture;
 using Names = std::vector<std::string>;
 
 TEST_F(Manager, PutsOnePreviewOnTopAndShowsTheNextInItsPlace)

@@ -1,0 +1,200 @@
+#include "preview/PreviewBaseViewController.h"
+
+#include "PreviewFixture.h"
+#include "platform/components/DocumentInteractionSheet.h"
+#include "platform/components/PlaceholderView.h"
+#include "platform/ui/AlertController.h"
+#include "platform/ui/Button.h"
+#include "platform/ui/NavigationItem.h"
+#include "platform/ui/Screen.h"
+#include "platform/ui/ScrollView.h"
+
+#include <gmock/gmock.h>
+
+using namespace platform;
+using namespace tarrow;
+using platform::ui::SystemItem;
+using testing::ElementsAre;
+
+namespace {
+
+constexpr ui::TraitCollection phone{ui::SizeClass::Compact, ui::SizeClass::Regular};
+constexpr ui::TraitCollection lying{ui::SizeClass::Compact, ui::SizeClass::Compact};
+constexpr ui::TraitCollection tablet{ui::SizeClass::Regular, ui::SizeClass::Regular};
+
+/// A screen with a button that opens the item elsewhere.
+class ScreenWithButton : public PreviewBaseViewController {
+public:
+    std::shared_ptr<ui::Button> openInAppNavControllerButton() override { return button; }
+    std::shared_ptr<ui::Button> button;
+};
+
+class Base : public testing_support::PreviewFixture {
+protected:
+    Base() { resize({360, 640}, phone); }
+    ~Base() override { ui::Screen::setMain(std::nullopt); }
+
+    void resize(Size size, const ui::TraitCollection& traits,
+        ui::UserInterfaceIdiom idiom = ui::UserInterfaceIdiom::Phone)
+    {
+        ui::Screen::setMain(ui::Screen{{0, 0, size.width, size.height}, 1, idiom, {0, 0, size.width, 20}});
+        window->resized(size, traits);
+        window->layoutIfNeeded();
+    }
+    std::shared_ptr<ScreenWithButton> show(const std::shared_ptr<DRItem>& item)
+    {
+        manager->setItemUpdatePreview(item, false);
+        const auto screen = std::make_shared<ScreenWithButton>();
+        screen->setItemManager(manager);
+        navigation->pushViewController(screen, false);
+        window->layoutIfNeeded();
+        return screen;
+    }
+    static std::vector<SystemItem> symbols(const ui::BarButtonItems& items)
+    {
+        std::vector<SystemItem> found;
+        for (const auto& item : items)
+            found.push_back(item->systemItem());
+        return found;
+    }
+};
+
+TEST_F(Base, ContentLiesBetweenTheBars)
+{
+    const auto screen = show(document("Notes.txt"));
+    navigation->barsResized({{0, 0, 360, 44}, {0, 0, 360, 50}});
+    window->layoutIfNeeded();
+    EXPECT_EQ(screen->contentView()->frame(), (Rect{0, 0, 360, 640 - 20 - 44 - 50}));
+    EXPECT_EQ(screen->scrollView()->contentSize(), (Size{360, 526}));
+    EXPECT_EQ(screen->scrollView()->frame(), (Rect{0, 0, 360, 640}));
+    EXPECT_EQ(screen->wrapperView()->frame(), (Rect{0, 0, 360, 526 - 17}));
+
+    navigation->setToolbarHidden(true);
+    screen->view()->setNeedsLayout();
+    window->layoutIfNeeded();
+    EXPECT_EQ(screen->contentView()->frame().height, 640 - 20 - 44) << "a hidden toolbar takes nothing";
+}
+
+TEST_F(Base, OnlyAnUprightScreenHasABottomMargin)
+{
+    const auto screen = show(document("Notes.txt"));
+    struct Row {
+        const char* what;
+        Size size;
+        ui::TraitCollection traits;
+        int orientation;
+        double margin;
+    };
+    const Row rows[] = {
+        {"phone", {360, 640}, phone, 1, -17},
+        {"phone on its side", {640, 360}, lying, 3, 0},
+        {"tablet", {768, 1024}, tablet, 1, -17},
+        {"tablet on its side", {1024, 768}, tablet, 3, 0},
+        {"narrow part of a tablet on its side", {1024, 768}, phone, 1, -17},
+    };
+    for (const auto& row : rows) {
+        resize(row.size, row.traits);
+        const bool isUpright = screen->currentPseudoOrientation() <= 2;
+        EXPECT_EQ(isUpright, row.orientation <= 2) << row.what;
+        EXPECT_EQ(screen->parentBottomConstraint()->constant(), row.margin) << row.what;
+    }
+}
+
+TEST_F(Base, APhoneHasItsButtonsBelowAndATabletAbove)
+{
+    const auto screen = show(document("Notes.txt"));
+    EXPECT_THAT(symbols(screen->toolbarItems()),
+        ElementsAre(SystemItem::Action, SystemItem::FlexibleSpace, SystemItem::Trash,
+            SystemItem::FlexibleSpace, SystemItem::Organize));
+    EXPECT_FALSE(navigation->isToolbarHidden());
+    EXPECT_TRUE(screen->navigationItem().rightItems().empty());
+    const auto first = screen->barButtonActionItem();
+
+    resize({1024, 768}, tablet, ui::UserInterfaceIdiom::Tablet);
+    EXPECT_THAT(symbols(screen->navigationItem().rightItems()),
+        ElementsAre(SystemItem::Action, SystemItem::FixedSpace, SystemItem::Trash, SystemItem::FixedSpace,
+            SystemItem::Organize));
+    EXPECT_TRUE(navigation->isToolbarHidden());
+    EXPECT_NE(screen->barButtonActionItem(), first);
+    EXPECT_EQ(screen->barButtonActionItem(), screen->navigationItem().rightItems().front());
+
+    resize({360, 640}, phone);
+    EXPECT_TRUE(screen->navigationItem().rightItems().empty());
+    EXPECT_EQ(screen->barButtonMoveItem(), screen->toolbarItems().back());
+    navigation->popViewController(false);
+    navigation->pushViewController(screen, false);
+    EXPECT_EQ(screen->barButtonMoveItem(), screen->toolbarItems().back()) << "the ones of this appearance";
+    EXPECT_EQ(screen->view()->subviews().size(), 1U);
+}
+
+TEST_F(Base, NothingCanBeDoneWithoutAnItem)
+{
+    const auto screen = show(nullptr);
+    const auto buttons = [&] {
+        return std::vector{
+            screen->barButtonActionItem(), screen->barButtonDeleteItem(), screen->barButtonMoveItem()};
+    };
+    for (const auto& button : buttons())
+        EXPECT_FALSE(button->press());
+    screen->showDocumentActivities(nullptr);
+    screen->showMoveTarget(nullptr);
+    EXPECT_FALSE(navigation->presentedViewController());
+    manager->setItemUpdatePreview(document("Notes.txt"), false);
+    screen->refreshItem();
+    for (const auto& button : buttons())
+        EXPECT_TRUE(button->isEnabled());
+    manager = nullptr;
+    screen->refreshItem();
+    for (const auto& button : buttons())
+        EXPECT_FALSE(button->isEnabled());
+}
+
+TEST_F(Base, TheOpenButtonStandsInAPhonesBar)
+{
+    const auto screen = std::make_shared<ScreenWithButton>();
+    screen->button = std::make_shared<ui::Button>("Open");
+    screen->setItemManager(manager);
+    manager->setItemUpdatePreview(document("Notes.txt"), false);
+    navigation->pushViewController(screen, false);
+    ASSERT_EQ(screen->navigationItem().rightItems().size(), 1U);
+    EXPECT_EQ(screen->navigationItem().rightItems().front()->customView(), screen->button);
+    EXPECT_TRUE(screen->button->press());
+    EXPECT_EQ(drive.log->count(
+                  "WARNING Failed to open document " + logText(drive.url("Notes.txt")) + " in default app"),
+        1U)
+        << "there is no such app";
+    screen->setMode(PreviewModeQuick);
+    screen->configureButtons();
+    EXPECT_TRUE(screen->navigationItem().rightItems().empty());
+}
+
+TEST_F(Base, SharesTheDocumentThatTheItemStandsFor)
+{
+    const auto screen = show(document("Notes.txt"));
+    EXPECT_TRUE(screen->barButtonActionItem()->press());
+    const auto sheet = manager->documentInteractionController();
+    ASSERT_TRUE(sheet);
+    EXPECT_EQ(sheet->url(), drive.url("Notes.txt"));
+    EXPECT_TRUE(std::dynamic_pointer_cast<ui::AlertController>(navigation->presentedViewController()));
+    navigation->dismissViewController(false);
+
+    const auto nowhere = document("Other.txt");
+    nowhere->setResolvedURL(std::nullopt);
+    manager->setItemUpdatePreview(nowhere, false);
+    EXPECT_TRUE(screen->barButtonActionItem()->press());
+    EXPECT_EQ(drive.log->count("WARNING showDocumentActivities: url is wrong class: (null)"), 1U);
+    EXPECT_FALSE(navigation->presentedViewController());
+}
+
+TEST_F(Base, TheDeleteQuestionPointsAtItsButton)
+{
+    const auto screen = show(document("Notes.txt"));
+    EXPECT_TRUE(screen->barButtonDeleteItem()->press());
+    const auto alert = std::dynamic_pointer_cast<ui::AlertController>(navigation->presentedViewController());
+    ASSERT_TRUE(alert);
+    const auto* anchor = std::get_if<std::weak_ptr<ui::BarButtonItem>>(&alert->popoverAnchor());
+    ASSERT_TRUE(anchor);
+    EXPECT_EQ(anchor->lock(), screen->barButtonDeleteItem());
+}
+
+} // namespace

@@ -1,0 +1,63 @@
+#pragma once
+
+#include "items/DRItem.h"
+#include "platform/ui/NavigationController.h"
+#include "platform/ui/Window.h"
+#include "preview/LookwellItemController.h"
+#include "preview/PreviewDetailsViewController.h"
+#include "preview/PreviewItemManager.h"
+#include "tests/components/support/ComponentsFixture.h"
+
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace testing_support {
+
+/// A manager over a stack in a window of a phone's size, with one screen below.
+class PreviewFixture : public ComponentsFixture {
+protected:
+    PreviewFixture()
+    {
+        navigation->setViewControllers({base}, false);
+        window->setRootViewController(navigation);
+        window->makeKeyAndVisible();
+    }
+    ~PreviewFixture() override
+    {
+        tarrow::LookwellItemController::defaultController()->lookwellNewItem(nullptr);
+        manager = nullptr;
+    }
+    std::shared_ptr<tarrow::DRItem> document(const char* name)
+    {
+        return tarrow::DRItem::initWithURL(drive.writeDocument(name, "content of " + std::string(name)));
+    }
+    /// The last names of the shown folders, "*" for the quick preview, "i" for a details screen,
+    /// "-" for another one.
+    std::vector<std::string> stack() const
+    {
+        std::vector<std::string> names;
+        for (const auto& screen : navigation->viewControllers()) {
+            const auto list = std::dynamic_pointer_cast<platform::components::DocumentListController>(screen);
+            const bool isDetails =
+                std::dynamic_pointer_cast<tarrow::PreviewDetailsViewController>(screen) != nullptr;
+            names.push_back(list        ? list->presentedURL()->lastPathComponent()
+                    : screen == preview ? "*"
+                    : isDetails         ? "i"
+                                        : "-");
+        }
+        return names;
+    }
+
+    std::shared_ptr<platform::ui::NavigationController> navigation =
+        std::make_shared<platform::ui::NavigationController>();
+    std::shared_ptr<platform::ui::ViewController> base = std::make_shared<platform::ui::ViewController>();
+    std::shared_ptr<platform::ui::Window> window =
+        std::make_shared<platform::ui::Window>(platform::Rect{0, 0, 360, 640});
+    std::shared_ptr<tarrow::PreviewItemManager> manager =
+        tarrow::PreviewItemManager::newItemManagerWithModeNavController(tarrow::PreviewModeQuick, navigation);
+    std::shared_ptr<tarrow::LookwellItemController> preview =
+        tarrow::LookwellItemController::defaultController();
+};
+
+} // namespace testing_support

@@ -1,0 +1,373 @@
+#include "PreviewFixture.h"
+#include "items/FileUtils.h"
+#include "platform/ActivityHandOver.h"
+#include "platform/components/PlaceholderView.h"
+#include "platform/components/PreviewContent.h"
+#include "platform/ui/AlertController.h"
+
+#include <fcntl.h>
+#include <gmock/gmock.h>
+#include <sys/stat.h>
+
+#include <filesystem>
+#include <fstream>
+#include <thread>
+
+using namespace platform;
+using namespace tarrow;
+using platform::components::MoveTargetPicker;
+using platform::ui::AlertController;
+using testing::ElementsAre;
+using testing::HasSubstr;
+
+namespace {
+
+/// What others, and its own buttons, do to the previewed document.
+class Presenter : public testing_support::PreviewFixture {
+protected:
+    /// Previews a document and lets everything that follows come to rest.
+    Url preview(const char* name, int mode = PreviewModeQuick)
+    {
+        const auto item = document(name);
+        manager->setMode(mode);
+        manager->previewItem(item);
+        drive.settle();
+        return item->url();
+    }
+    /// Saves a document as another program does, `seconds` after its last change.
+    void save(const Url& url, const std::string& content, int seconds) const
+    {
+        static_cast<void>(
+            drive.fileCoordinator->coordinateWriting(url, WritingOptions::None, [&](const Url& place) {
+                struct stat before { };
+                ::stat(place.path().c_str(), &before);
+                std::ofstream(place.path(), std::ios::trunc) << content;
+                const timespec times[] = {
+                    before.st_atim, {before.st_mtim.tv_sec + seconds, before.st_mtim.tv_nsec}};
+                ::utimensat(AT_FDCWD, place.path().c_str(), times, 0);
+            }));
+    }
+    std::size_t refreshes() const
+    {
+        std::size_t count = 0;
+        for (const auto& line : drive.log->lines())
+            count += line.starts_with("INFO Refreshing ") ? 1 : 0;
+        return count;
+    }
+    std::shared_ptr<AlertController> alert() const
+    {
+        return std::dynamic_pointer_cast<AlertController>(navigation->presentedViewController());
+    }
+    std::string top() const { return Url::fileURL(drive.layout().defaultContainer()).lastPathComponent(); }
+    static constexpr auto reloaded = "DEBUG LWPreviewController: refreshCurrentPreviewItem";
+};
+
+TEST_F(Presenter, ReadsOnceForAllChangesOfASecond)
+{
+    const auto url = preview("Notes.txt");
+    save(url, "first", 10);
+    drive.settle();
+    drive.dispatch->advance(0.3);
+    save(url, "second", 10);
+    drive.settle();
+    EXPECT_TRUE(manager->refreshPending());
+    drive.dispatch->advance(0.6);
+    EXPECT_EQ(refreshes(), 0U);
+    drive.dispatch->advance(0.2);
+    EXPECT_EQ(refreshes(), 1U);
+    EXPECT_FALSE(manager->refreshPending());
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(LookwellItemController::defaultController()->content()->text, "second");
+
+    save(url, "third", 10);
+    drive.settle();
+    drive.dispatch->advance(1.1);
+    EXPECT_EQ(refreshes(), 2U) << "the next change counts anew";
+}
+
+TEST_F(Presenter, ReloadsOnlyNewerContentThatSomebodySees)
+{
+    const auto url = preview("Notes.txt");
+    const auto screen = LookwellItemController::defaultController();
+    const auto change = [&](int seconds) {
+        drive.log->clear();
+        screen->setTitle("Old");
+        save(url, "changed", seconds);
+        drive.settle();
+        drive.dispatch->advance(1.1);
+    };
+    change(0);
+    EXPECT_EQ(screen->title(), "Notes.txt");
+    EXPECT_EQ(drive.log->count(reloaded), 0U) << "the content is as old as it was";
+    change(10);
+    EXPECT_EQ(drive.log->count(reloaded), 1U);
+    change(-20);
+    EXPECT_EQ(drive.log->count(reloaded), 0U) << "an older version came back";
+    navigation->popViewController(false);
+    change(40);
+    EXPECT_EQ(drive.log->count(reloaded), 0U) << "nobody sees it";
+    EXPECT_EQ(refreshes(), 1U);
+}
+
+TEST_F(Presenter, BringsTheDetailsUpToDate)
+{
+    const auto url = preview("Notes.txt", PreviewModeDetails);
+    EXPECT_THAT(stack(), ElementsAre("-", "i"));
+    const auto details = manager->detailsViewController();
+    ASSERT_TRUE(details);
+    EXPECT_EQ(details->mode(), PreviewModeDetails);
+    EXPECT_EQ(details->itemManager(), manager);
+    const auto before = details->summaryView()->content();
+    EXPECT_EQ(before.title, "Notes.txt");
+    save(url, std::string(5000, 'x'), 10);
+    drive.settle();
+    drive.dispatch->advance(1.1);
+    EXPECT_NE(details->summaryView()->content(), before);
+
+    manager->previewItem(DRItem::initWithURL(url));
+    EXPECT_NE(manager->detailsViewController(), details) << "each preview has a screen of its own";
+    EXPECT_EQ(navigation->topViewController(), manager->detailsViewController());
+    navigation->popViewController(false);
+    EXPECT_FALSE(manager->detailsViewController());
+}
+
+TEST_F(Presenter, SaysThatAnItemIsElsewhereThoughNobodyMovedIt)
+{
+    preview("Notes.txt");
+    const auto other = document("Other.txt")->url();
+    manager->refreshItem(other);
+    EXPECT_EQ(manager->item()->url(), other);
+    EXPECT_THAT(drive.log->lines(), testing::Contains(HasSubstr("ERROR UNEXPECTED: path changed")));
+    EXPECT_THAT(stack(), ElementsAre("-", "*"));
+    manager->refreshItem(drive.url("Gone.txt"));
+    EXPECT_EQ(manager->item()->url(), other) << "what cannot be read changes nothing";
+}
+
+TEST_F(Presenter, FollowsAMove)
+{
+    const auto url = preview("Notes.txt");
+    const auto target = drive.makeFolder("Documents/Trip").appendingPathComponent("Plan.txt");
+    EXPECT_FALSE(FileUtils::moveTo(url, target));
+    drive.settle();
+    EXPECT_THAT(stack(), ElementsAre(top(), "Documents", "Trip", "*"));
+    EXPECT_EQ(manager->item()->url(), target);
+    EXPECT_TRUE(manager->filePresenterRegistered());
+
+    drive.log->clear();
+    const auto screens = navigation->viewControllers();
+    manager->presentedItemDidMoveToURL(target);
+    drive.settle();
+    EXPECT_EQ(drive.log->count(
+                  "WARNING UNEXPECTED: duplicate calls to presentedItemDidMoveToURL: " + target.path()),
+        1U);
+    EXPECT_EQ(navigation->viewControllers(), screens);
+
+    // The folder above takes the document along.
+    EXPECT_FALSE(FileUtils::moveTo(drive.url("Documents/Trip"), drive.url("Desktop/Tour")));
+    drive.settle();
+    EXPECT_THAT(stack(), ElementsAre(top(), "Desktop", "Tour", "*"));
+}
+
+TEST_F(Presenter, ClosesForAnItemThatLeavesTheDrive)
+{
+    for (const auto& place : {drive.layout().trash() + "/Notes.txt", drive.folder().at("elsewhere.txt")}) {
+        preview("Notes.txt");
+        EXPECT_THAT(stack(), ElementsAre("-", "*"));
+        manager->presentedItemDidMoveToURL(Url::fileURL(place));
+        EXPECT_FALSE(manager->filePresenterRegistered());
+        drive.settle();
+        EXPECT_THAT(stack(), ElementsAre("-")) << place;
+    }
+}
+
+TEST_F(Presenter, ClosesForAnItemThatIsDeleted)
+{
+    const auto url = preview("Notes.txt");
+    EXPECT_FALSE(FileUtils::remove(url));
+    drive.settle();
+    EXPECT_EQ(drive.log->count("INFO Accommodate deletion: " + logText(url)), 1U);
+    EXPECT_THAT(stack(), ElementsAre("-"));
+    EXPECT_FALSE(manager->filePresenterRegistered());
+    EXPECT_FALSE(manager->batonneActivity());
+}
+
+TEST_F(Presenter, TakesNoOtherScreenAway)
+{
+    const auto prepared = document("Notes.txt");
+    const auto below = std::make_shared<ui::ViewController>();
+    navigation->pushViewController(below, false);
+    manager->prepareToPreviewItem(prepared);
+    EXPECT_FALSE(FileUtils::remove(prepared->url()));
+    drive.settle();
+    EXPECT_THAT(stack(), ElementsAre("-", "-")) << "a peek's document has no screen on the stack";
+}
+
+TEST_F(Presenter, LooksAgainWhenPartOfThePackageGoes)
+{
+    const auto url = preview("Notes.txt");
+    int answers = 0;
+    manager->accommodatePresentedSubitemDeletionAtURLCompletionHandler(
+        url.appendingPathComponent("part"), [&](const auto& error) {
+            EXPECT_FALSE(error);
+            ++answers;
+        });
+    EXPECT_EQ(answers, 1) << "the writer does not wait";
+    EXPECT_FALSE(manager->filePresenterRegistered());
+    drive.dispatch->advance(0.9);
+    EXPECT_EQ(drive.log->count(reloaded), 0U);
+    drive.dispatch->advance(0.2);
+    EXPECT_EQ(drive.log->count(reloaded), 1U);
+    EXPECT_EQ(refreshes(), 1U);
+    EXPECT_FALSE(manager->filePresenterRegistered());
+}
+
+TEST_F(Presenter, HearsNothingWhileTheApplicationIsNotActive)
+{
+    const auto url = preview("Notes.txt");
+    drive.notifications->post(Notification::ApplicationWillResignActive);
+    drive.log->clear();
+    save(url, "changed", 10);
+    drive.settle();
+    drive.dispatch->advance(2);
+    EXPECT_THAT(drive.log->lines(), testing::Not(testing::Contains(HasSubstr("presentedItem"))));
+}
+
+TEST_F(Presenter, DoesNothingOnceItIsGone)
+{
+    const auto url = preview("Notes.txt");
+    manager->presentedItemDidChange();
+    manager->presentedItemDidMoveToURL(drive.url("Documents"));
+    manager->accommodatePresentedSubitemDeletionAtURLCompletionHandler(url, [](const auto&) {});
+    drive.log->clear();
+    manager = nullptr;
+    drive.settle();
+    drive.dispatch->advance(2);
+    EXPECT_EQ(refreshes(), 0U);
+    EXPECT_THAT(stack(), ElementsAre("-", "*"));
+}
+
+TEST_F(Presenter, EndsOnTheMainThreadWhoeverLetsGoLast)
+{
+    preview("Notes.txt");
+    const std::weak_ptr handedOver = manager->batonneActivity();
+    std::thread([last = std::move(manager)]() mutable { last = nullptr; }).join();
+    EXPECT_FALSE(handedOver.expired()) << "not on the other thread";
+    drive.settle();
+    EXPECT_TRUE(handedOver.expired());
+}
+
+TEST_F(Presenter, HandsTheDocumentOverWhileItIsWatched)
+{
+    const auto url = preview("Notes.txt");
+    const auto activity = manager->batonneActivity();
+    ASSERT_TRUE(activity);
+    EXPECT_EQ(activity->type, "BrindleDocsID.viewing");
+    EXPECT_TRUE(activity->isEligibleForHandOff);
+    ASSERT_EQ(activity->userInfo.size(), 1U);
+    const auto* bookmark = find(activity->userInfo, activityKey::documentURL)->get<std::string>();
+    ASSERT_TRUE(bookmark);
+    std::optional<Url> found;
+    drive.cloud->items().decodeBookmark(*bookmark, [&](const Result<Url>& answer) { found = answer.value; });
+    drive.settle();
+    EXPECT_EQ(found, url);
+    const std::filesystem::path published(drive.layout().activities());
+    EXPECT_FALSE(std::filesystem::is_empty(published));
+
+    drive.notifications->post(Notification::ApplicationWillResignActive);
+    EXPECT_FALSE(manager->batonneActivity());
+    drive.settle();
+    EXPECT_TRUE(std::filesystem::is_empty(published));
+    drive.notifications->post(Notification::ApplicationDidBecomeActive);
+    drive.settle();
+    EXPECT_FALSE(std::filesystem::is_empty(published));
+
+    manager->prepareToPreviewItem(DRItem::initWithURL(url));
+    EXPECT_TRUE(manager->batonneActivity()) << "the same item stays watched";
+    manager->prepareToPreviewItem(document("Other.txt"));
+    EXPECT_FALSE(manager->batonneActivity());
+    manager->unregisterAsFilePresenter();
+    drive.settle();
+    EXPECT_FALSE(manager->batonneActivity()) << "a bookmark that came too late";
+    EXPECT_TRUE(std::filesystem::is_empty(published));
+    manager->registerBatonneActivityForBookmark("");
+    EXPECT_FALSE(manager->batonneActivity());
+}
+
+TEST_F(Presenter, HandsOverNothingThatOthersCannotOpen)
+{
+    const auto outside = Url::fileURL(drive.folder().write("outside.txt", "text"));
+    manager->previewItem(DRItem::initWithURL(outside));
+    drive.settle();
+    EXPECT_FALSE(manager->batonneActivity());
+    EXPECT_THAT(drive.log->lines(),
+        testing::Contains(HasSubstr("INFO RZBookmarkableStringFromDocumentURL returned ")));
+}
+
+TEST_F(Presenter, DeletesWhenTheUserConfirms)
+{
+    const auto url = preview("Notes.txt");
+    const auto press = [&](std::size_t action) {
+        LookwellItemController::defaultController()->additionalRightBarButtonItems().front()->press();
+        ASSERT_TRUE(alert());
+        EXPECT_THAT(alert()->message(), HasSubstr("Notes.txt"));
+        EXPECT_TRUE(alert()->press(action));
+        drive.settle();
+    };
+    press(1);
+    EXPECT_THAT(stack(), ElementsAre("-", "*"));
+    press(0);
+    EXPECT_THAT(stack(), ElementsAre("-"));
+    EXPECT_FALSE(alert());
+    EXPECT_FALSE(std::filesystem::exists(url.path()));
+    EXPECT_THAT(drive.log->activities(),
+        testing::IsSupersetOf(
+            {"Pressed Delete (LW)", "Delete was Cancelled (itemMgr)", "Delete was Confirmed (itemMgr)"}));
+}
+
+TEST_F(Presenter, SaysWhyADocumentCouldNotBeDeleted)
+{
+    const auto url = preview("Notes.txt");
+    manager->showWarningAndDeleteDocumentBarButton(navigation->topViewController(), nullptr);
+    ASSERT_TRUE(alert());
+    const auto question = alert();
+    manager->unregisterAsFilePresenter();
+    std::filesystem::remove(url.path());
+    EXPECT_TRUE(question->press(0));
+    drive.settle();
+    ASSERT_TRUE(alert());
+    EXPECT_EQ(alert()->actions().size(), 1U);
+    EXPECT_FALSE(alert()->title().empty());
+}
+
+TEST_F(Presenter, MovesToTheChosenFolder)
+{
+    const auto url = preview("Notes.txt");
+    const auto folder = drive.makeFolder("Documents/Trip");
+    const auto choose = [&] {
+        LookwellItemController::defaultController()->additionalRightBarButtonItems().back()->press();
+        drive.settle();
+        const auto picker =
+            std::dynamic_pointer_cast<MoveTargetPicker>(navigation->presentedViewController());
+        ASSERT_TRUE(picker);
+        EXPECT_EQ(picker->presentationStyle(), ui::PresentationStyle::OverCurrentContext);
+        EXPECT_EQ(picker->itemsToMove(), std::vector{manager->item()->url()});
+        picker->choose(folder);
+        EXPECT_FALSE(std::dynamic_pointer_cast<MoveTargetPicker>(navigation->presentedViewController()));
+        drive.settle();
+    };
+    drive.writeDocument("Documents/Trip/Notes.txt", "taken");
+    choose();
+    ASSERT_TRUE(alert()) << "the name is taken there";
+    EXPECT_TRUE(alert()->press(0));
+    EXPECT_THAT(stack(), ElementsAre("-", "*")) << "the preview stays";
+
+    std::filesystem::remove(folder.path() + "/Notes.txt");
+    choose();
+    EXPECT_FALSE(alert());
+    EXPECT_FALSE(std::filesystem::exists(url.path()));
+    EXPECT_THAT(stack(), ElementsAre(top(), "Documents", "Trip", "*"));
+    EXPECT_EQ(drive.log->count("DEBUG MoveTarget = " + logText(folder)), 2U);
+    EXPECT_EQ(drive.log->count("DEBUG Presented moveTarget"), 2U);
+}
+
+} // namespace
