@@ -27,7 +27,7 @@ std::string keyOf(const ActivityOffer& offer)
 std::string titleOf(const ActivityOffer& offer)
 {
     using platform::components::displayName;
-    const auto text = platform::localized("“%1$@” is open on %2$@",
+    const auto text = platform::localized("“%1$@” on %2$@",
         {displayName(offer.document.lastPathComponent()), displayName(offer.deviceName)});
     const std::unique_ptr<char, decltype(&g_free)> escaped(
         g_markup_escape_text(text.data(), static_cast<gssize>(text.size())), g_free);

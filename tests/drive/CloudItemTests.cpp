@@ -225,6 +225,21 @@ TEST_F(BookmarkMaking, namesADocumentForOtherDevices)
     EXPECT_EQ(decode(*make(_drive.url("way/a.txt"))).value, rows[0]) << "the place without the link";
 }
 
+TEST_F(BookmarkMaking, outlivesMovesAndNewNames)
+{
+    const auto document = _drive.writeDocument("Documents/a.txt");
+    const auto text = make(document);
+    ASSERT_TRUE(text);
+    const auto here = _drive.url("Desktop/b.txt"), elsewhere = _drive.url("Desktop/Folder/c.txt");
+    EXPECT_FALSE(_drive.cloud->itemChanges()->moveItem(document.path(), here.path()));
+    EXPECT_EQ(decode(*text).value, here);
+    _drive.makeFolder("Desktop/Folder");
+    std::filesystem::rename(here.path(), elsewhere.path());
+    _drive.writeDocument("Documents/a.txt", "another document in the old place");
+    EXPECT_EQ(decode(*text).value, elsewhere) << "moved by another program";
+    EXPECT_EQ(make(elsewhere).value.has_value(), true);
+}
+
 TEST_F(BookmarkMaking, refusesWhatNoOtherDeviceCanOpen)
 {
     const auto outside = _drive.folder().write("outside/a.txt", "");

@@ -197,6 +197,7 @@ TEST_F(Presenter, TakesNoOtherScreenAway)
     const auto below = std::make_shared<ui::ViewController>();
     navigation->pushViewController(below, false);
     manager->prepareToPreviewItem(prepared);
+    drive.settle();
     EXPECT_FALSE(FileUtils::remove(prepared->url()));
     drive.settle();
     EXPECT_THAT(stack(), ElementsAre("-", "-")) << "a peek's document has no screen on the stack";

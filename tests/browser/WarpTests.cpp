@@ -1,0 +1,146 @@
+#include "browser/NavController.h"
+#include "items/FileUtils.h"
+#include "platform/components/DocumentListController.h"
+#include "platform/components/MoveTargetPicker.h"
+#include "platform/ui/AlertController.h"
+#include "platform/ui/NavigationItem.h"
+#include "platform/ui/SearchPresentation.h"
+#include "preview/LookwellItemController.h"
+#include "preview/PreviewItemManager.h"
+#include "tests/browser/support/BrowserFixture.h"
+
+#include <gmock/gmock.h>
+
+#include <filesystem>
+
+namespace tarrow {
+namespace {
+
+using namespace testing_support;
+using platform::Url;
+using platform::components::MoveTargetPicker;
+using testing::ElementsAre;
+
+constexpr auto top = "BrindleDefault";
+
+/// Entries from outside that come in the middle of something.
+class WarpTest : public BrowserFixture {
+protected:
+    void open(const Url& document)
+    {
+        browser->documentListControllerDidSelectItemAtURL(topList(), document);
+        settle();
+    }
+    bool warp(const char* path, int mode = PreviewModeQuick)
+    {
+        return browser->warpToNewURLPreviewMode(url(path), mode);
+    }
+    Url shownItem() const { return browser->itemManager()->item()->url(); }
+};
+
+TEST_F(WarpTest, AQuestionThatIsOpenIsDroppedUnanswered)
+{
+    const auto first = write("first.txt");
+    write("Folder/second.txt");
+    launch();
+    open(first);
+    LookwellItemController::defaultController()->showWarningAndDeleteDocument(nullptr);
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_TRUE(warp("Folder/second.txt"));
+    settle();
+    EXPECT_EQ(alert(), nullptr);
+    EXPECT_THAT(stack(), ElementsAre(top, "Folder", "*"));
+    EXPECT_TRUE(FileUtils::exists(first));
+
+    // A refused entry closes the question, too, and leaves the rest.
+    LookwellItemController::defaultController()->showWarningAndDeleteDocument(nullptr);
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_FALSE(warp("../../trash/second.txt"));
+    settle();
+    EXPECT_EQ(alert(), nullptr);
+    EXPECT_THAT(stack(), ElementsAre(top, "Folder", "*"));
+    EXPECT_TRUE(browser->itemManager()->filePresenterRegistered());
+}
+
+TEST_F(WarpTest, AMoveThatIsRunningEndsWithoutPullingTheScreenAlong)
+{
+    const auto first = write("first.txt");
+    write("Folder/second.txt");
+    drive.makeFolder("Target");
+    launch();
+    open(first);
+    LookwellItemController::defaultController()->showMoveTarget(nullptr);
+    settle();
+    const auto picker = std::dynamic_pointer_cast<MoveTargetPicker>(browser->presentedViewController());
+    ASSERT_NE(picker, nullptr);
+    picker->choose(url("Target"));
+    EXPECT_TRUE(FileUtils::exists(first)) << "not begun";
+    EXPECT_TRUE(warp("Folder/second.txt", PreviewModeDetails));
+    settle();
+    EXPECT_TRUE(FileUtils::exists(url("Target/first.txt"))) << "what was asked for happens";
+    EXPECT_THAT(stack(), ElementsAre(top, "Folder", "i"));
+    EXPECT_EQ(shownItem(), url("Folder/second.txt"));
+    EXPECT_EQ(alert(), nullptr);
+}
+
+TEST_F(WarpTest, ThePreviewedDocumentIsShownAnew)
+{
+    write("Folder/note.txt");
+    launch();
+    for (int i = 0; i < 2; ++i) {
+        EXPECT_TRUE(warp("Folder/note.txt"));
+        settle();
+        EXPECT_THAT(stack(), ElementsAre(top, "Folder", "*"));
+        EXPECT_TRUE(browser->itemManager()->filePresenterRegistered());
+        EXPECT_TRUE(LookwellItemController::defaultController()->isVisible());
+    }
+    EXPECT_FALSE(FileUtils::moveTo(url("Folder/note.txt"), url("Folder/renamed.txt")));
+    settle();
+    EXPECT_EQ(shownItem(), url("Folder/renamed.txt"));
+    EXPECT_TRUE(LookwellItemController::defaultController()->isVisible());
+    EXPECT_TRUE(browser->itemManager()->filePresenterRegistered());
+}
+
+TEST_F(WarpTest, ADocumentThatOthersTakeAwayClosesItsPreview)
+{
+    write("Folder/note.txt");
+    launch();
+    EXPECT_TRUE(warp("Folder/note.txt"));
+    settle();
+    EXPECT_FALSE(FileUtils::remove(url("Folder")));
+    settle();
+    EXPECT_EQ(browser->itemManager(), nullptr);
+    EXPECT_THAT(stack(), testing::Not(testing::Contains("*")));
+}
+
+TEST_F(WarpTest, ASearchResultIsPreviewedWhereTheSearchWas)
+{
+    const auto note = write("note.txt");
+    launch();
+    topList()->startSearchWithQueryStringBecomeFirstResponder("note", true);
+    settle();
+    ASSERT_NE(std::dynamic_pointer_cast<platform::ui::SearchPresentation>(browser->presentedViewController()),
+        nullptr);
+    open(note);
+    EXPECT_EQ(browser->presentedViewController(), nullptr);
+    EXPECT_THAT(stack(), ElementsAre(top, "*"));
+    EXPECT_EQ(shownItem(), note);
+}
+
+TEST_F(WarpTest, ChoosingItemsEnds)
+{
+    write("Folder/note.txt");
+    launch();
+    EXPECT_TRUE(topList()->navigationItem().rightItems().front()->press());
+    ASSERT_TRUE(browser->editMode());
+    EXPECT_TRUE(warp("Folder/note.txt"));
+    settle();
+    EXPECT_THAT(stack(), ElementsAre(top, "Folder", "*"));
+    browser->popViewController(false);
+    settle();
+    EXPECT_FALSE(topList()->editing());
+    EXPECT_FALSE(browser->editMode());
+}
+
+} // namespace
+} // namespace tarrow
