@@ -5,6 +5,7 @@
 #include <gmock/gmock.h>
 
 #include <filesystem>
+#include <set>
 
 namespace tarrow {
 namespace {
@@ -145,6 +146,20 @@ TEST_F(MenuEnableChecksTest, OnlyFoldersThatAreShownTakeMovedItems)
 
     EXPECT_EQ(MenuEnableChecks::numFoldersInURLArray({at("gone"), at("Desktop"), at("Documents")}), 1U);
     EXPECT_EQ(MenuEnableChecks::numFoldersInURLArray({at("gone"), writeDocument("b.txt")}), 0U);
+}
+
+TEST_F(MenuEnableChecksTest, OneFolderIsEnoughToLookAt)
+{
+    const auto top = library("box", "any");
+    for (int number = 0; number < 50; ++number)
+        std::filesystem::create_directories(top.path() + "/Folder " + std::to_string(number));
+    std::set<std::string> looked;
+    changeValues([&](const Url& item, AttributeMap&) {
+        if (item.path().starts_with(top.path() + "/Folder "))
+            looked.insert(item.path());
+    });
+    EXPECT_TRUE(MenuEnableChecks::containerHasSubfolders(top));
+    EXPECT_EQ(looked.size(), 1U);
 }
 
 } // namespace
