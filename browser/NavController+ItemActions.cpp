@@ -73,6 +73,7 @@ void NavController::documentListControllerPerformActionURLOriginatingViewComplet
         performDelete(url, originatingView, completion);
         return;
     case DocumentListAction::More:
+        op.userAction("DLC Action More");
         op.error("performAction:%{public}@ -- More is deprecated, unexpected value", action);
         return;
     case DocumentListAction::Info:

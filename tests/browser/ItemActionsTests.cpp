@@ -342,6 +342,7 @@ TEST_F(ItemActionsTest, CodesThatNobodyOffers)
     perform(DocumentListAction::More, document);
     EXPECT_EQ(completions, 0);
     EXPECT_EQ(log->count("ERROR performAction:1 -- More is deprecated, unexpected value"), 1);
+    EXPECT_THAT(log->activities(), ElementsAre("DLC Action More"));
     perform(7, document);
     EXPECT_EQ(completions, 1);
     EXPECT_EQ(log->count("ERROR performAction:7 -- unexpected value"), 1);

@@ -153,6 +153,15 @@ TEST_F(QuotaFetcherTest, ADelegateMayLeaveTheCallOutOrBeGone)
     EXPECT_EQ(fetcher->freeBytes(), 5);
 }
 
+TEST_F(QuotaFetcherTest, AnAnswerMayComeAfterTheFetcherHasGone)
+{
+    cloud->beforeAnswer = [this] { fetcher = nullptr; };
+    fetcher->fetchNow();
+    dispatch->runUntilIdle();
+    EXPECT_EQ(cloud->requests, 1);
+    EXPECT_THAT(delegate->values, IsEmpty());
+}
+
 TEST_F(QuotaFetcherTest, WorkUnderWayDoesNotKeepAFetcherAlive)
 {
     fetcher->runWithInterval(300.0);

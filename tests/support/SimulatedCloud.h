@@ -2,6 +2,7 @@
 
 #include "platform/CloudDocumentService.h"
 
+#include <functional>
 #include <memory>
 #include <optional>
 
@@ -19,6 +20,7 @@ public:
     std::optional<platform::PropertyValue> token = platform::PropertyValue("account-1");
     platform::Result<std::int64_t> quota = std::int64_t{1000};
     mutable int requests = 0;
+    std::function<void()> beforeAnswer; ///< called while a quota request is out
 
     platform::CloudAccount& account() override { return *this; }
     platform::PromisedItems& promisedItems() override { return _documents->promisedItems(); }
@@ -39,6 +41,8 @@ public:
     {
         return [this, completion = std::move(completion)] {
             ++requests;
+            if (beforeAnswer)
+                beforeAnswer();
             completion(quota);
         };
     }
