@@ -38,10 +38,16 @@ DocumentIndex::State DocumentIndex::state() const
     return _database.prepareFor(Use::Reading);
 }
 
-DocumentIndex::Answer DocumentIndex::lookUp(std::uint32_t identifier) const
+DocumentIndex::State DocumentIndex::prepareForWriting()
 {
     const std::lock_guard lock(_mutex);
-    const auto state = _database.prepareFor(Use::Reading);
+    return _database.prepareFor(Use::Writing);
+}
+
+DocumentIndex::Answer DocumentIndex::lookUp(std::uint32_t identifier, Use use) const
+{
+    const std::lock_guard lock(_mutex);
+    const auto state = _database.prepareFor(use);
     if (state == State::Missing)
         return {Answer::Kind::Unknown, {}};
     if (state != State::Incomplete && state != State::Complete)
@@ -132,7 +138,8 @@ void DocumentIndex::release(std::uint32_t identifier)
 void DocumentIndex::noteMove(const std::string& from, const std::string& to)
 {
     const std::lock_guard lock(_mutex);
-    if (!isReadyFor(Use::Writing))
+    // Where there is no index, nothing can have moved in it.
+    if (_database.prepareFor(Use::Reading) == State::Missing || !isReadyFor(Use::Writing))
         return;
     const PathsBelow below(from);
     auto query = _database.query("UPDATE documents SET path = CAST(?4 || substr(path, ?5) AS BLOB)"

@@ -46,10 +46,13 @@ public:
         Kind kind = Kind::Unreadable;
         DocumentPlace place; ///< of a known one
     };
-    Answer lookUp(std::uint32_t identifier) const;
+    /// Waits for nobody unless it is for writing.
+    Answer lookUp(std::uint32_t identifier, IndexDatabase::Use use = IndexDatabase::Use::Reading) const;
     /// All documents at a path and below it.
     std::vector<IdentifiedPlace> documentsWithin(const std::string& path) const;
     State state() const;
+    /// The same, but with patience, and of an index that was made where there was none to use.
+    State prepareForWriting();
 
     /// Notes where a document is, making the index when there is none; whether it was noted. One that was
     /// removed stays so.

@@ -9,7 +9,7 @@ namespace host::drive {
 
 namespace {
 
-constexpr int patience = 250; // milliseconds that a writer waits for another process that writes
+constexpr int patience = 500; // milliseconds that a writer waits for another process that writes
 
 // Versions of what the file holds. Any other number is a file that this program did not write.
 constexpr int incompleteVersion = 11;

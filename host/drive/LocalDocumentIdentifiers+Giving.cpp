@@ -54,33 +54,36 @@ Result<std::uint32_t> LocalDocumentIdentifiers::identifyAt(const std::string& pa
     if (failure == ELOOP || !item->canCarryIdentifier())
         return platform::Error(platform::FileErrorCode::Unsupported);
     // Whether another item has the identifier can be told only by an index that knows them all.
-    if (_index.state() != DocumentIndex::State::Complete)
+    if (_index.prepareForWriting() == DocumentIndex::State::Incomplete)
         rebuild();
-    if (_index.state() != DocumentIndex::State::Complete)
+    if (_index.prepareForWriting() != DocumentIndex::State::Complete)
         return itemError(EAGAIN, path);
     const auto identifier = item->identifier();
-    if (identifier != 0 && isOwner(identifier, item->place()))
+    const auto answer = _index.lookUp(identifier, IndexDatabase::Use::Writing);
+    if (answer.kind == Kind::Unreadable)
+        return itemError(EAGAIN, path);
+    if (identifier != 0 && isOwner({identifier, answer.place}, answer.kind, item->place()))
         return identifier;
     return giveIdentifier(*item);
 }
 
-bool LocalDocumentIdentifiers::isOwner(std::uint32_t identifier, const DocumentPlace& place)
+bool LocalDocumentIdentifiers::isOwner(
+    const IdentifiedPlace& known, DocumentIndex::Answer::Kind kind, const DocumentPlace& place)
 {
-    const auto answer = _index.lookUp(identifier);
-    if (answer.kind == Kind::Known && answer.place == place)
-        return true;
-    if (answer.kind == Kind::Removed || answer.kind == Kind::Unreadable)
+    if (kind == Kind::Removed)
         return false;
-    if (answer.kind == Kind::Known && answer.place.inode != place.inode) {
+    if (kind == Kind::Known && known.place == place)
+        return true;
+    if (kind == Kind::Known && known.place.inode != place.inode) {
         // The document that has it may have been moved or saved anew by others. This item has it only when
         // no other can be found.
-        const auto owner = locate({identifier, answer.place}, Effort::Whole);
+        const auto owner = locate(known, Effort::Whole);
         if (owner && owner->inode != place.inode) {
-            _index.note(identifier, *owner);
+            _index.note(known.identifier, *owner);
             return false;
         }
     }
-    _index.note(identifier, place);
+    _index.note(known.identifier, place);
     return true;
 }
 

@@ -95,8 +95,12 @@ Result<std::shared_ptr<const platform::DocumentIdentifiers::OpenFile>> LocalDocu
     if (!isPlainRelativePath(file.place))
         return failed(ENOENT);
     auto item = IdentifiedItem::open(_layout, file.place);
-    if (!item)
+    if (!item) {
+        // A link may lead to where the document went; then only a search finds its own place.
+        for (const auto& known : _index.documentsWithin(file.place))
+            searchInBackground(known);
         return *item.error;
+    }
     if (item->inode() != file.number)
         return failed(ESTALE);
     return std::shared_ptr<const OpenFile>(std::make_shared<IdentifiedItem>(std::move(*item.value)));

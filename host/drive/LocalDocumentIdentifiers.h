@@ -55,7 +55,7 @@ private:
     void rebuild();
     void correct(std::uint32_t identifier, const std::string& path);
     platform::Result<std::uint32_t> giveIdentifier(const IdentifiedItem& item);
-    bool isOwner(std::uint32_t identifier, const DocumentPlace& place);
+    bool isOwner(const IdentifiedPlace& known, DocumentIndex::Answer::Kind kind, const DocumentPlace& place);
     bool isAt(const IdentifiedPlace& known) const;
     std::optional<std::string> relativePath(const std::string& path) const;
 

@@ -243,6 +243,16 @@ TEST_F(DocumentIdentifierTests, aDeepSearchEndsInTheBackground)
     EXPECT_EQ(find(identifier), _drive.url("Documents/z/a.txt"));
 }
 
+TEST_F(DocumentIdentifierTests, aLinkInPlaceOfTheFolderIsNotFollowed)
+{
+    const auto identifier = identify(document("F/a.txt"));
+    moveByOthers("F", "G");
+    _drive.writeLink("F", "G");
+    EXPECT_EQ(find(identifier), std::nullopt);
+    _drive.settle();
+    EXPECT_EQ(find(identifier), _drive.url("G/a.txt"));
+}
+
 class DamagedIndexTests : public DocumentIdentifierTests {
 protected:
     void SetUp() override
@@ -374,7 +384,10 @@ TEST_F(DocumentIdentifierTests, aWriterThatIsKilledLeavesWhatItHadNoted)
 
 TEST_F(DocumentIdentifierTests, processesThatIdentifyOneCopyAgree)
 {
-    const auto original = identify(document("a.txt"));
+    // The connection must be closed before the process is doubled.
+    const auto original = LocalDocumentIdentifiers::create(_drive.layout(), _drive.dispatch)
+                              ->identify(document("a.txt"))
+                              .value.value_or(0);
     for (int round = 0; round < 10; ++round) {
         copyByOthers("a.txt", "copy.txt");
         int ends[2];
