@@ -1,6 +1,8 @@
 #include "tests/items/support/ItemsFixture.h"
 
 #include "host/system/IcuFormatters.h"
+#include "host/system/JsonKeyedArchiver.h"
+#include "host/system/JsonUserDefaults.h"
 #include "host/system/MimeTypeRegistry.h"
 #include "host/system/PosixFileSystem.h"
 #include "host/system/ThreadedFolderLister.h"
@@ -31,6 +33,9 @@ ItemsFixture::ItemsFixture()
     set.typeRegistry = types;
     set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(dispatch, types, "en_US");
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(set.typeRegistry);
+    // A list asks them for the order that it had last.
+    set.keyedArchiver = std::make_shared<host::system::JsonKeyedArchiver>();
+    set.userDefaults = std::make_shared<host::system::JsonUserDefaults>(layout().defaults(), *dispatch);
     platform::installServices(std::move(set));
 }
 
