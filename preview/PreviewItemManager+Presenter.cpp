@@ -146,8 +146,20 @@ void PreviewItemManager::presentedItemDidMoveToURL(const Url& newURL)
     }
     services().dispatch().mainQueue()->async([weak = weak_from_this(), real] {
         if (const auto self = weak.lock())
-            self->warpToNewURL(real);
+            self->followTo(real);
     });
+}
+
+/// What is only peeked at is kept ready at its new place; nobody asked to leave the list.
+void PreviewItemManager::followTo(const Url& url)
+{
+    const auto navigation = navigationController();
+    const bool isPeekedAt = filePresenterRegistered() && navigation
+        && !isPreviewControllerDisplayed(navigation->topViewController());
+    if (isPeekedAt)
+        prepareToPreviewItem(DRItem::initWithURL(url));
+    else
+        warpToNewURL(url);
 }
 
 void PreviewItemManager::accommodatePresentedItemDeletionWithCompletionHandler(CompletionHandler completion)

@@ -135,6 +135,7 @@ private:
     void willResignActiveNotification();
     std::optional<platform::Url> itemURL() const;
     void keepItem(const std::shared_ptr<DRItem>& item);
+    void followTo(const platform::Url& url);
     void popPreview();
     void refreshAfterSubitemDeletion();
     void clearRefreshPending();

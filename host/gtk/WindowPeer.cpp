@@ -63,8 +63,8 @@ void WindowPeer::build(AdwApplication* application, const WindowSize& size)
     _window = ObjectRef<GtkWidget>::retain(made);
     _overlay = gtk_overlay_new();
     _toasts = ADW_TOAST_OVERLAY(adw_toast_overlay_new());
-    adw_toast_overlay_set_child(_toasts, _overlay);
-    _bin->setChild(GTK_WIDGET(_toasts));
+    gtk_overlay_set_child(GTK_OVERLAY(_overlay), GTK_WIDGET(_toasts));
+    _bin->setChild(_overlay);
     adw_application_window_set_content(ADW_APPLICATION_WINDOW(made), _bin->widget());
     gtk_window_set_title(window(), platform::localized("Tarrow Drive").c_str());
     gtk_widget_set_size_request(made, minimumWidth, minimumHeight);
@@ -135,13 +135,13 @@ void WindowPeer::showRoot()
 {
     const auto shown = model();
     const auto root = shown ? shown->rootViewController() : nullptr;
-    gtk_overlay_set_child(GTK_OVERLAY(_overlay), nullptr);
+    adw_toast_overlay_set_child(_toasts, nullptr);
     if (_root)
         _context->scheduler().release(std::exchange(_root, nullptr));
     if (!root)
         return;
     _root = makeScreenPeer(_context, root, WindowButtons::Shown);
-    gtk_overlay_set_child(GTK_OVERLAY(_overlay), _root->widget());
+    adw_toast_overlay_set_child(_toasts, _root->widget());
 }
 
 void WindowPeer::rootDidChange(ui::Window&)

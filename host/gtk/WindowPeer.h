@@ -33,7 +33,7 @@ public:
 
     void show();
     GtkWindow* window() const { return GTK_WINDOW(_window.get()); }
-    /// Where short messages show, over everything else.
+    /// Where short messages show: over the root screen, below what is presented.
     AdwToastOverlay* toasts() const { return _toasts; }
     const std::shared_ptr<PeerContext>& context() const { return _context; }
     ScreenPeer* rootPeer() const { return _root.get(); }

@@ -113,6 +113,34 @@ TEST_F(WarpTest, ADocumentThatOthersTakeAwayClosesItsPreview)
     EXPECT_THAT(stack(), testing::Not(testing::Contains("*")));
 }
 
+TEST_F(WarpTest, WhatIsDoneFromAPeekLeavesTheListWhereItIs)
+{
+    const auto note = write("note.txt");
+    launch();
+    const auto peek = [&](const Url& item) {
+        return browser->documentListControllerViewControllerForPreviewingItemAtURL(topList(), item);
+    };
+    ASSERT_NE(peek(note), nullptr);
+    settle();
+    EXPECT_FALSE(FileUtils::moveTo(note, url("renamed.txt")));
+    settle();
+    EXPECT_THAT(stack(), ElementsAre(top));
+    EXPECT_EQ(shownItem(), url("renamed.txt"));
+    browser->knopPopToURL(url("renamed.txt"));
+    settle();
+    EXPECT_THAT(stack(), ElementsAre(top, "*"));
+    EXPECT_EQ(
+        LookwellItemController::defaultController()->arrayOfDocuments(), std::vector{url("renamed.txt")});
+    browser->popViewController(false);
+    settle();
+
+    ASSERT_NE(peek(url("renamed.txt")), nullptr);
+    settle();
+    EXPECT_FALSE(FileUtils::remove(url("renamed.txt")));
+    settle();
+    EXPECT_THAT(stack(), ElementsAre(top));
+}
+
 TEST_F(WarpTest, ASearchResultIsPreviewedWhereTheSearchWas)
 {
     const auto note = write("note.txt");
