@@ -38,6 +38,14 @@ Place placeOf(const MenuEnableChecks::List& list, const Operation& op)
     return {};
 }
 
+/// Whether a list may show special folders or containers, which lie right at the top of a container. Where
+/// none can be, a selection of 100,000 items need not be looked through.
+bool mayShowSpecialItems(const MenuEnableChecks::List& list)
+{
+    const auto& url = list.presentedURL();
+    return !url || services().cloudDocumentService().containers().isContainerTopFolder(*url);
+}
+
 bool isFolder(const Url& url)
 {
     constexpr std::array keys{AttributeKey::IsDirectory, AttributeKey::IsPackage};
@@ -100,17 +108,24 @@ bool MenuEnableChecks::isDesktopOrDocumentsInURLArray(const std::vector<Url>& ur
 
 bool MenuEnableChecks::canShowMoveForSelectedItems(const List& list)
 {
-    const auto selection = list.selectedItems();
-    if (selection.empty() || isDesktopOrDocumentsInURLArray(selection)
-        || numContainersInURLArray(selection) > 0)
+    if (list.selectedItemCount() == 0)
         return false;
-    return containerSupportsAnyDepth(list) || numFoldersInURLArray(selection) == 0;
+    const auto isSpecial = [](const std::vector<Url>& selection) {
+        return isDesktopOrDocumentsInURLArray(selection) || numContainersInURLArray(selection) > 0;
+    };
+    if (mayShowSpecialItems(list) && isSpecial(list.selectedItems()))
+        return false;
+    return containerSupportsAnyDepth(list) || numFoldersInURLArray(list.selectedItems()) == 0;
 }
 
 bool MenuEnableChecks::canShowDeleteForSelectedItems(const List& list)
 {
+    if (list.selectedItemCount() == 0)
+        return false;
+    if (!mayShowSpecialItems(list))
+        return true;
     const auto selection = list.selectedItems();
-    if (selection.empty() || isDesktopOrDocumentsInURLArray(selection))
+    if (isDesktopOrDocumentsInURLArray(selection))
         return false;
     const auto containers = numContainersInURLArray(selection);
     return containers == 0 || containers == selection.size();

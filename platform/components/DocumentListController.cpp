@@ -11,6 +11,7 @@
 #include "platform/components/FolderPlaces.h"
 #include "platform/components/PlaceholderView.h"
 #include "platform/ui/ListView.h"
+#include "platform/ui/NavigationController.h"
 #include "platform/ui/NavigationItem.h"
 
 #include <chrono>
@@ -55,10 +56,8 @@ std::vector<std::shared_ptr<DocumentListController>> DocumentListController::hie
 DocumentListController::DocumentListController(std::optional<Url> folder)
     : _presentedURL(std::move(folder))
 {
-    if (!_presentedURL)
-        return;
-    setTitle(folderTitle(*_presentedURL));
-    _order = savedOrder(*_presentedURL);
+    if (_presentedURL)
+        setTitle(folderTitle(*_presentedURL));
 }
 
 DocumentListController::~DocumentListController() = default;
@@ -103,6 +102,7 @@ void DocumentListController::viewDidLoad()
     offerSearch();
     if (!_presentedURL)
         return;
+    _order = savedOrder(*_presentedURL);
     navigationItem().setMenu(localized("Order and Options"), [weak = std::weak_ptr(self())] {
         const auto list = weak.lock();
         return list ? list->optionsMenu() : ui::Menu();
@@ -115,6 +115,18 @@ void DocumentListController::viewDidLoad()
     refresh();
     followLibraries();
     showLoadingAfterDelay();
+}
+
+void DocumentListController::takeKeyboard()
+{
+    // A list in a peek leaves the keyboard to the peek, one under a search or a question to that.
+    const auto stack = navigationController();
+    const bool isOnTop = stack && stack->topViewController().get() == this && !presentedViewController();
+    if (_hasTakenKeyboard || !isOnTop || appearanceState() != ui::AppearanceState::Appeared
+        || containedItemCount() == 0)
+        return;
+    _hasTakenKeyboard = true;
+    _listView->becomeFirstResponder();
 }
 
 void DocumentListController::offerSearch()
@@ -164,6 +176,8 @@ void DocumentListController::librariesMayHaveChanged()
 void DocumentListController::viewDidAppear(bool animated)
 {
     ui::ViewController::viewDidAppear(animated);
+    _hasTakenKeyboard = false;
+    takeKeyboard();
     // The delegate takes the list off the stack, which must not happen while the stack is still moving.
     if (_wasRemoved)
         services().dispatch().mainQueue()->async([weak = std::weak_ptr(self())] {
@@ -184,6 +198,7 @@ void DocumentListController::contentsDidChange(const FolderContentsUpdate& updat
     if (update.stage != ListingStage::FirstRows)
         _listView->endRefreshing();
     showStateOfFolder();
+    takeKeyboard();
     if (const auto told = delegate())
         told->documentListControllerItemsChanged(keepsAlive);
     _wasRemoved = update.error && saysItemIsGone(*update.error);

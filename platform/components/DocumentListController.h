@@ -88,7 +88,7 @@ public:
     /// Lists the folder anew.
     void refresh();
 
-    /// The order of the items; the user's choice for this folder at first.
+    /// The order of the items; once the view is loaded the user's choice for this folder.
     const ListOrder& order() const { return _order; }
     /// Shows another order and keeps it for the folder.
     void setOrder(const ListOrder& order);
@@ -128,6 +128,8 @@ private:
     void contentsDidChange(const FolderContentsUpdate& update);
     void showStateOfFolder();
     void offerSearch();
+    /// Once for each appearance, as soon as there are rows.
+    void takeKeyboard();
     void followLibraries();
     void librariesMayHaveChanged();
     void showLoadingAfterDelay();
@@ -153,7 +155,7 @@ private:
     bool _editing = false;
     std::optional<ListingStage> _state; ///< of the latest update; nothing before the first
     std::optional<Error> _failure;
-    bool _wasRemoved = false, _reportedRemoval = false;
+    bool _wasRemoved = false, _reportedRemoval = false, _hasTakenKeyboard = false;
 };
 
 /// How a list reads in a log line.

@@ -136,9 +136,12 @@ Image DocumentRowSource::iconFor(std::size_t index, const FolderEntry& entry) co
 {
     if (const auto* extra = _rows->extraItem(index); extra && !extra->iconName.empty())
         return Image::named(extra->iconName);
-    if (entry.kind == FolderEntryKind::Link && nameExtension(entry.name).empty())
-        return Image::named(linkIcon);
-    return Image::named(opensAsFolder(entry.kind) ? folderIcon : documentIcon(entry.name));
+    if (opensAsFolder(entry.kind))
+        return Image::named(folderIcon);
+    const auto& icon = documentIcon(entry.name);
+    // A link that its name gives no type of its own shows that it is one.
+    const bool isPlainLink = entry.kind == FolderEntryKind::Link && icon == plainDocumentIcon;
+    return Image::named(isPlainLink ? linkIcon : icon);
 }
 
 const std::string& DocumentRowSource::documentIcon(std::string_view name) const

@@ -247,6 +247,12 @@ void ListView::pulledToRefresh()
     delegate->refreshRequested(*this);
 }
 
+bool ListView::becomeFirstResponder()
+{
+    askForFocus(true);
+    return true;
+}
+
 void ListView::layoutSubviews()
 {
     setContentSize({bounds().width, static_cast<double>(_rowCount) * _rowHeight});

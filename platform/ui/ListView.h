@@ -63,6 +63,7 @@ public:
     std::optional<std::size_t> rowBeginningWith(std::string_view text, std::size_t from) const;
     void pulledToRefresh();
 
+    bool becomeFirstResponder() override; ///< the row that had the keyboard last has it then, else the first
     void layoutSubviews() override;
 
 protected:
