@@ -38,6 +38,7 @@ struct Picture {
     };
     std::vector<Frame> frames; ///< all of one size
     int sourceWidth = 0, sourceHeight = 0; ///< pixels of the file, as its camera was held
+    bool breaksOff = false; ///< the file is damaged further down: what could be read is here
 };
 
 /// Decodes picture files. Any thread; a call waits for the file and takes as long as the decoding.

@@ -164,6 +164,11 @@ public:
                 gdk_pixbuf_loader_set_size(loader, wanted->width, wanted->height);
             }),
             &_size);
+        g_signal_connect(_loader.get(), "area-updated",
+            G_CALLBACK(+[](GdkPixbufLoader*, int, int y, int, int height, int* bottom) {
+                *bottom = std::max(*bottom, y + height);
+            }),
+            &_bottom);
     }
     ~Decoder() { end(); }
     Decoder(const Decoder&) = delete;
@@ -174,10 +179,16 @@ public:
         const auto* data = reinterpret_cast<const guchar*>(bytes.data());
         return gdk_pixbuf_loader_write(_loader.get(), data, bytes.size(), nullptr) != FALSE;
     }
-    void end()
+    /// False: the picture is not whole.
+    bool end()
     {
-        if (!std::exchange(_ended, true))
-            gdk_pixbuf_loader_close(_loader.get(), nullptr);
+        return std::exchange(_ended, true) || gdk_pixbuf_loader_close(_loader.get(), nullptr) != FALSE;
+    }
+    /// Whether all rows of the picture came. The JPEG decoder fills the others with grey and calls it whole.
+    bool hasAllRows() const
+    {
+        const auto* pixbuf = gdk_pixbuf_loader_get_pixbuf(_loader.get());
+        return !pixbuf || _bottom >= gdk_pixbuf_get_height(pixbuf);
     }
     Animation animation() const
     {
@@ -190,12 +201,14 @@ public:
 private:
     std::unique_ptr<GdkPixbufLoader, Unref> _loader;
     PixelSize _size;
+    int _bottom = 0; ///< of the rows that came
     bool _ended = false;
 };
 
 struct Decoded {
     Animation animation;
     std::size_t frames = 1;
+    bool breaksOff = false;
 };
 
 Result<Decoded> decode(const std::string& path, PixelSize size, const Cancelled& isCancelled)
@@ -205,19 +218,23 @@ Result<Decoded> decode(const std::string& path, PixelSize size, const Cancelled&
         return systemError(errno, path);
     Decoder decoder(size);
     std::string gif; // the bytes, while they may be an animation's
+    bool breaksOff = false, isJpeg = false, isFirst = true;
     for (auto piece = file.next(); !piece.empty(); piece = file.next()) {
         if (isCancelled())
             return imageError(ImageErrorCode::Cancelled);
-        if (!gif.empty() || piece.starts_with("GIF8"))
+        if (!gif.empty() || (isFirst && piece.starts_with("GIF8")))
             gif += piece;
-        if (!decoder.feed(piece))
+        isJpeg = isJpeg || (isFirst && piece.starts_with("\xFF\xD8"));
+        isFirst = false;
+        breaksOff = !decoder.feed(piece);
+        if (breaksOff)
             break;
     }
-    decoder.end();
+    breaksOff = !decoder.end() || breaksOff || (isJpeg && !decoder.hasAllRows());
     auto animation = decoder.animation();
     if (!animation)
         return imageError(ImageErrorCode::Damaged);
-    return Decoded{std::move(animation), std::max<std::size_t>(1, gifFrameCount(gif))};
+    return Decoded{std::move(animation), std::max<std::size_t>(1, gifFrameCount(gif)), breaksOff};
 }
 
 // The library's animations know no other clock than this type that its own library discourages.
@@ -233,9 +250,6 @@ void advance(AnimationTime& time, int milliseconds)
     time.tv_usec %= perSecond;
 }
 
-constexpr int shortestFrame = 20; ///< milliseconds; quicker ones are files that mean "as usual"
-constexpr int usualFrame = 100;
-
 std::vector<Picture::Frame> framesOf(
     const Decoded& decoded, const ImageLimits& limits, const Cancelled& isCancelled)
 {
@@ -248,7 +262,7 @@ std::vector<Picture::Frame> framesOf(
         const int delay = gdk_pixbuf_animation_iter_get_delay_time(step.get());
         if (!shown)
             break;
-        frames.push_back({imageOf(shown.get(), limits.scale), delay < shortestFrame ? usualFrame : delay});
+        frames.push_back({imageOf(shown.get(), limits.scale), std::max(delay, 0)});
         if (delay < 0)
             break;
         advance(now, std::max(delay, 1));
@@ -298,6 +312,7 @@ Result<Picture> GdkPixbufImageLoader::loadPicture(
     if (!decoded)
         return *decoded.error;
     auto picture = stillOf(*decoded.value, limits);
+    picture.breaksOff = decoded->breaksOff;
     if (isMoving(*decoded.value, wanted, limits))
         picture.frames = framesOf(*decoded.value, limits, isCancelled);
     if (isCancelled())

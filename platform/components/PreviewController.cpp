@@ -17,6 +17,7 @@
 #include "platform/ui/NavigationItem.h"
 #include "platform/ui/TextField.h"
 
+#include <algorithm>
 #include <chrono>
 #include <utility>
 
@@ -118,8 +119,22 @@ void PreviewController::viewDidDisappear(bool animated)
     ViewController::viewDidDisappear(animated);
     if (_previewView)
         _previewView->stop();
-    if (navigationController())
-        return;
+    // Under another screen it keeps its place.
+    const auto navigation = navigationController();
+    if (!navigation || std::ranges::count(navigation->viewControllers(), shared_from_this()) == 0)
+        close();
+}
+
+void PreviewController::didMoveToParentViewController(const std::shared_ptr<ViewController>& parent)
+{
+    ViewController::didMoveToParentViewController(parent);
+    if (!parent)
+        close();
+}
+
+/// Ends all work, and keeps nothing of the document but where it is.
+void PreviewController::close()
+{
     cancelLoad();
     leaveDownload();
     forgetContent();
@@ -229,8 +244,8 @@ void PreviewController::showContent()
 void PreviewController::showPreview(const std::shared_ptr<PreviewView>& preview)
 {
     _previewView = preview;
-    const bool noteIsShown = _content->kind == PreviewContent::Kind::Text;
-    _screen->setNote(noteIsShown ? _content->note : std::string());
+    // The note of a recording is its kind and size.
+    _screen->setNote(isMedia(*_content) ? std::string() : _content->note);
     _screen->setContent(preview);
     connectPreview();
 }

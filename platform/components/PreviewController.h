@@ -57,6 +57,7 @@ public:
     void viewWillAppear(bool animated) override;
     void viewDidAppear(bool animated) override;
     void viewDidDisappear(bool animated) override;
+    void didMoveToParentViewController(const std::shared_ptr<ViewController>& parent) override;
     bool backRequested() override;
 
     /// What is shown now; null until something is.
@@ -90,6 +91,7 @@ private:
     void showNothing();
     void showLoadingAfterDelay();
     void forgetContent();
+    void close();
     void connectPreview();
     void previewFailed(const std::string& words);
     std::shared_ptr<const PreviewContent> withoutPlayer(std::shared_ptr<const PreviewContent> content) const;

@@ -102,12 +102,15 @@ PreviewContent imageContent(PreviewContent content, const Reading& reading)
             loaded.error ? errorWords(*loaded.error) : localized("It could not be read."));
     content.kind = Kind::Image;
     content.picture = *loaded.value;
-    content.note.clear();
+    content.note =
+        loaded->breaksOff ? localized("The picture is damaged. Not all of it can be shown.") : std::string();
     return content;
 }
 
-std::string textNote(bool isCut, bool hasLongLines)
+std::string textNote(bool isEmpty, bool isCut, bool hasLongLines)
 {
+    if (isEmpty)
+        return localized("This document is empty.");
     if (isCut)
         return localized("Only the beginning of this document is shown.");
     return hasLongLines ? localized("Only the beginnings of very long lines are shown.") : std::string();
@@ -129,7 +132,7 @@ PreviewContent textContent(PreviewContent content, const Reading& reading, bool 
     const auto decoded = decodedText(bytes, isCut ? TextEnd::Cut : TextEnd::Whole);
     content.text = withoutLongLines(decoded, reading.limits.maxLineBytes);
     content.isSource = !isPlain;
-    content.note = textNote(isCut, content.text != decoded);
+    content.note = textNote(count == 0, isCut, content.text != decoded);
     return content;
 }
 

@@ -10,6 +10,7 @@
 #include "platform/components/TextDecoding.h"
 #include "platform/ui/Button.h"
 #include "platform/ui/Label.h"
+#include "platform/ui/NavigationController.h"
 #include "platform/ui/Screen.h"
 #include "platform/ui/TextField.h"
 #include "tests/components/support/ComponentsFixture.h"
@@ -82,7 +83,7 @@ TEST_F(Preview, ChoosesWhatToShowByTheDocument)
         {"Picture.png", twoPixels, Kind::Image, ""},
         {"Broken.png", "no picture at all", Kind::Failure, "damaged"},
         {"Notes.txt", "Hello", Kind::Text, ""},
-        {"Empty.txt", "", Kind::Text, ""},
+        {"Empty.txt", "", Kind::Text, "empty"},
         {"Plan.pdf", "%PDF-1.4", Kind::Failure, "damaged"},
         {"Secret.pdf", secret, Kind::Failure, "password"},
         {"Song.wav", "RIFF", Kind::Sound, "4 bytes"},
@@ -307,6 +308,26 @@ TEST_F(Download, EndsWhenTheScreenIsLeft)
     appear();
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(screen->content()->text, "Hello");
+}
+
+TEST_F(Download, EndsWhenThePersonGoesBack)
+{
+    putContent();
+    show({*far});
+    drive.dispatch->runUntilIdle();
+    const auto stack = std::make_shared<ui::NavigationController>();
+    const auto list = std::make_shared<ui::ViewController>();
+    stack->setViewControllers({list, screen}, false);
+    stack->beginAppearance(true, false);
+    stack->endAppearance();
+    EXPECT_TRUE(screen->isDownloading());
+    // Under another screen it goes on.
+    stack->pushViewController(std::make_shared<ui::ViewController>(), false);
+    EXPECT_TRUE(screen->isDownloading());
+    stack->setViewControllers({list}, false);
+    EXPECT_FALSE(screen->isDownloading());
+    drive.dispatch->runUntilIdle();
+    EXPECT_FALSE(std::filesystem::exists(far->path()));
 }
 
 TEST_F(Preview, OffersToOpenElsewhereWhatItCannotShow)

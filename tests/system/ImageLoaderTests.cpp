@@ -70,6 +70,36 @@ TEST(ImageLoader, SaysWhyAPictureCannotBeShown)
     EXPECT_TRUE(missing.error->is(FileErrorCode::NoSuchFile));
 }
 
+TEST(ImageLoader, ReadsTheFramesOfAnAnimation)
+{
+    using namespace std::string_literals;
+    // One pixel that is black for 200 milliseconds and white for 10.
+    const auto frame = [](char delay, char color) {
+        return "\x21\xF9\4\0"s + delay + "\0\0\0"s + "\x2C\0\0\0\0\1\0\1\0\0\2\2"s + color + "\1\0"s;
+    };
+    const auto gif = "GIF89a\1\0\1\0\x80\0\0\0\0\0\xFF\xFF\xFF"s + frame(20, '\x44') + frame(1, '\x4C') + ";";
+    const TemporaryDirectory folder;
+    const auto path = folder.write("moving.gif", gif);
+    const auto never = [] { return false; };
+    const GdkPixbufImageLoader loader;
+    const auto picture = loader.loadPicture(path, {}, never);
+    ASSERT_TRUE(picture);
+    ASSERT_EQ(picture->frames.size(), 2U);
+    EXPECT_EQ(picture->frames[0].image.pixels()[0], 0xFF000000);
+    EXPECT_EQ(picture->frames[1].image.pixels()[0], 0xFFFFFFFF);
+    EXPECT_EQ(picture->frames[0].milliseconds, 200);
+    EXPECT_FALSE(picture->breaksOff);
+
+    EXPECT_EQ(loader.loadPicture(path, {.maxAnimationBytes = 7}, never)->frames.size(), 1U);
+    const auto cancelled = loader.loadPicture(path, {}, [] { return true; });
+    EXPECT_EQ(cancelled.error->code(), static_cast<int>(ImageErrorCode::Cancelled));
+
+    // Broken off within its second frame.
+    const auto half = loader.loadPicture(folder.write("half.gif", gif.substr(0, gif.size() - 6)), {}, never);
+    ASSERT_TRUE(half);
+    EXPECT_TRUE(half->breaksOff);
+}
+
 TEST(ImageLoader, DoesNotWaitForAPipe)
 {
     const TemporaryDirectory folder;
