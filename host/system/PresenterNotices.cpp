@@ -75,11 +75,15 @@ Url moved(const Url& url, const Url& from, const Url& to)
 
 } // namespace
 
+// A presenter takes itself off the list when it ends. What is looked at here may be held by nobody else by
+// now, so it is let go only after the lock.
+
 void PresenterNotices::add(const std::shared_ptr<FilePresenter>& presenter)
 {
+    std::vector<std::shared_ptr<FilePresenter>> endLater;
     const std::lock_guard lock(_mutex);
     std::erase_if(_presenters, [&](const auto& known) {
-        const auto strong = known.lock();
+        const auto& strong = endLater.emplace_back(known.lock());
         return !strong || strong == presenter;
     });
     _presenters.push_back(presenter);
@@ -87,9 +91,10 @@ void PresenterNotices::add(const std::shared_ptr<FilePresenter>& presenter)
 
 void PresenterNotices::remove(const FilePresenter& presenter)
 {
+    std::vector<std::shared_ptr<FilePresenter>> endLater;
     const std::lock_guard lock(_mutex);
     std::erase_if(_presenters, [&](const auto& known) {
-        const auto strong = known.lock();
+        const auto& strong = endLater.emplace_back(known.lock());
         return !strong || strong.get() == &presenter;
     });
 }

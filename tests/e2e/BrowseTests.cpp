@@ -4,7 +4,9 @@
 
 #include <cstdlib>
 #include <fcntl.h>
+#include <filesystem>
 #include <fstream>
+#include <map>
 #include <regex>
 #include <signal.h>
 #include <spawn.h>
@@ -125,6 +127,41 @@ TEST_F(BrowseTests, ANewFolderIsMadeOnceItsNameIsAccepted)
     press("Create");
     EXPECT_TRUE(Accessible::waitFor([&] { return shows("Old pictures"); }));
     EXPECT_TRUE(Accessible::waitFor([&] { return entries().empty(); }));
+}
+
+/// The activities that devices publish on this drive, by the names of their files.
+std::map<std::string, std::string> activities()
+{
+    std::map<std::string, std::string> found;
+    std::error_code problem;
+    const auto folder = std::filesystem::path(getenv("TARROW_DRIVE_HOME")) / "activities";
+    for (const auto& entry : std::filesystem::directory_iterator(folder, problem)) {
+        std::ifstream file(entry.path());
+        if (entry.path().extension() == ".json")
+            found[entry.path().stem()] = std::string(std::istreambuf_iterator<char>(file), {});
+    }
+    return found;
+}
+
+TEST_F(BrowseTests, ADocumentIsHandedOverAndTakenFromAnotherDevice)
+{
+    press("Notebook");
+    press("Ideas.md");
+    ASSERT_TRUE(Accessible::waitFor([] { return activities().size() == 1; }));
+    const auto [device, activity] = *activities().begin();
+    press("Back");
+    EXPECT_TRUE(Accessible::waitFor([] { return activities().empty(); })) << "taken back with its screen";
+
+    // Another device shows the same document.
+    const auto folder = std::string(getenv("TARROW_DRIVE_HOME")) + "/activities/";
+    auto other = activity;
+    other.replace(other.find(device), device.size(), "phone");
+    std::ofstream(folder + ".phone") << other;
+    std::filesystem::rename(folder + ".phone", folder + "phone.json");
+    press("Continue");
+    EXPECT_TRUE(Accessible::waitFor([device = device] { return activities().contains(device); }));
+    EXPECT_TRUE(Accessible::waitFor([this] { return !shows("Continue"); }));
+    std::filesystem::remove(folder + "phone.json");
 }
 
 } // namespace
