@@ -109,6 +109,9 @@ void NavController::dropItemManager()
 
 void NavController::replaceItemManager(int mode)
 {
+    // A list that is still moving in would be reported when the preview follows it, and take the manager
+    // along.
+    completeTransition();
     dropItemManager();
     _itemManager = PreviewItemManager::newItemManagerWithModeNavController(mode, self());
 }
@@ -297,6 +300,7 @@ NavController::Screen NavController::documentListControllerViewControllerForPrev
     const auto values =
         services().cloudDocumentService().promisedItems().promisedItemResourceValues(url, keys).value;
     if (values && (values->flag(AttributeKey::IsPackage) || values->flag(AttributeKey::IsRegularFile))) {
+        completeTransition();
         _itemManager = PreviewItemManager::newItemManagerWithModeNavController(PreviewModeQuick, self());
         return _itemManager->prepareToPreviewItem(DRItem::initWithURL(url));
     }

@@ -41,6 +41,8 @@ public:
 
     const BarFrames& barFrames() const { return _barFrames; }
     bool isTransitioning() const { return !_transition.isFinished(); }
+    /// Ends a movement that is still shown; its callbacks come at once.
+    void completeTransition() { _transition.finish(); }
     /// Whether the back button, a swipe or a key may go back now.
     bool canGoBack() const;
 

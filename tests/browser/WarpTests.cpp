@@ -23,6 +23,20 @@ using testing::ElementsAre;
 
 constexpr auto top = "BrindleDefault";
 
+/// Shows every movement until it is told that it ends.
+class SlowScreen : public platform::ui::NavigationObserver {
+public:
+    void navigationWillTransition(platform::ui::NavigationController&,
+        const platform::ui::NavigationTransition&, platform::ui::TransitionToken token) override
+    {
+        movement = std::move(token);
+    }
+    void stackDidChange(platform::ui::NavigationController&) override { }
+    void toolbarVisibilityDidChange(platform::ui::NavigationController&, bool) override { }
+
+    platform::ui::TransitionToken movement;
+};
+
 /// Entries from outside that come in the middle of something.
 class WarpTest : public BrowserFixture {
 protected:
@@ -81,6 +95,30 @@ TEST_F(WarpTest, AMoveThatIsRunningEndsWithoutPullingTheScreenAlong)
     EXPECT_THAT(stack(), ElementsAre(top, "Folder", "i"));
     EXPECT_EQ(shownItem(), url("Folder/second.txt"));
     EXPECT_EQ(alert(), nullptr);
+}
+
+TEST_F(WarpTest, ADocumentThatIsTappedWhileItsListMovesInKeepsItsManager)
+{
+    const auto note = write("Folder/note.txt");
+    launch();
+    const auto slow = std::make_shared<SlowScreen>();
+    browser->setNavigationObserver(slow);
+    const std::function<void()> ways[] = {[&] { open(note); }, [&] { warp("Folder/note.txt"); }};
+    for (const auto& way : ways) {
+        browser->documentListControllerDidSelectContainerWithViewController(
+            topList(), platform::components::DocumentListController::initWithURL(url("Folder")));
+        EXPECT_TRUE(browser->isTransitioning());
+        way();
+        settle();
+        slow->movement.finish();
+        EXPECT_THAT(stack(), ElementsAre(top, "Folder", "*"));
+        ASSERT_NE(browser->itemManager(), nullptr);
+        EXPECT_EQ(LookwellItemController::defaultController()->itemManager(), browser->itemManager());
+        browser->popToRootViewController(false);
+        slow->movement.finish();
+        settle();
+        EXPECT_EQ(browser->itemManager(), nullptr);
+    }
 }
 
 TEST_F(WarpTest, ThePreviewedDocumentIsShownAnew)
