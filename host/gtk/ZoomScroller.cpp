@@ -265,8 +265,12 @@ void ZoomScroller::zoomCanvasAllocate(int width, int height)
 void ZoomScroller::zoomCanvasSnapshot(GtkSnapshot* snapshot)
 {
     const auto seen = visible();
+    // On whole device pixels: what the content lines up with them stays sharp and without seams.
+    const double scale = gtk_widget_get_scale_factor(_canvas);
+    const auto whole = [scale](
+                           double points) { return static_cast<float>(std::round(points * scale) / scale); };
     graphene_point_t origin;
-    graphene_point_init(&origin, static_cast<float>(-seen.x), static_cast<float>(-seen.y));
+    graphene_point_init(&origin, whole(-seen.x), whole(-seen.y));
     gtk_snapshot_translate(snapshot, &origin);
     _content.draw(snapshot, seen);
 }

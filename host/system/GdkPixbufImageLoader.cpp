@@ -2,6 +2,7 @@
 
 #include "host/system/FileDescriptor.h"
 #include "host/system/GifFrames.h"
+#include "host/system/JpegEnd.h"
 #include "host/system/SystemErrors.h"
 
 #include <fcntl.h>
@@ -164,11 +165,6 @@ public:
                 gdk_pixbuf_loader_set_size(loader, wanted->width, wanted->height);
             }),
             &_size);
-        g_signal_connect(_loader.get(), "area-updated",
-            G_CALLBACK(+[](GdkPixbufLoader*, int, int y, int, int height, int* bottom) {
-                *bottom = std::max(*bottom, y + height);
-            }),
-            &_bottom);
     }
     ~Decoder() { end(); }
     Decoder(const Decoder&) = delete;
@@ -184,12 +180,6 @@ public:
     {
         return std::exchange(_ended, true) || gdk_pixbuf_loader_close(_loader.get(), nullptr) != FALSE;
     }
-    /// Whether all rows of the picture came. The JPEG decoder fills the others with grey and calls it whole.
-    bool hasAllRows() const
-    {
-        const auto* pixbuf = gdk_pixbuf_loader_get_pixbuf(_loader.get());
-        return !pixbuf || _bottom >= gdk_pixbuf_get_height(pixbuf);
-    }
     Animation animation() const
     {
         auto* found = gdk_pixbuf_loader_get_animation(_loader.get());
@@ -201,7 +191,6 @@ public:
 private:
     std::unique_ptr<GdkPixbufLoader, Unref> _loader;
     PixelSize _size;
-    int _bottom = 0; ///< of the rows that came
     bool _ended = false;
 };
 
@@ -218,19 +207,20 @@ Result<Decoded> decode(const std::string& path, PixelSize size, const Cancelled&
         return systemError(errno, path);
     Decoder decoder(size);
     std::string gif; // the bytes, while they may be an animation's
-    bool breaksOff = false, isJpeg = false, isFirst = true;
+    JpegEnd jpegEnd;
+    bool breaksOff = false, isFirst = true;
     for (auto piece = file.next(); !piece.empty(); piece = file.next()) {
         if (isCancelled())
             return imageError(ImageErrorCode::Cancelled);
         if (!gif.empty() || (isFirst && piece.starts_with("GIF8")))
             gif += piece;
-        isJpeg = isJpeg || (isFirst && piece.starts_with("\xFF\xD8"));
+        jpegEnd.feed(piece);
         isFirst = false;
         breaksOff = !decoder.feed(piece);
         if (breaksOff)
             break;
     }
-    breaksOff = !decoder.end() || breaksOff || (isJpeg && !decoder.hasAllRows());
+    breaksOff = !decoder.end() || breaksOff || jpegEnd.isMissing();
     auto animation = decoder.animation();
     if (!animation)
         return imageError(ImageErrorCode::Damaged);

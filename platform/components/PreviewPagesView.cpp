@@ -59,7 +59,7 @@ void PreviewPagesView::setDocument(std::shared_ptr<PagedDocument> document, Size
     _deck.setPages(std::move(pages));
     _currentPage = _deck.currentPage(_visible);
     _selection.clear();
-    readPageSizes();
+    _knowsSizes = count < 2;
     if (!query().empty())
         queryDidChange();
     native().notify([](auto& native) { native.previewContentDidChange(); });
@@ -70,8 +70,6 @@ void PreviewPagesView::setDocument(std::shared_ptr<PagedDocument> document, Size
 void PreviewPagesView::readPageSizes()
 {
     const auto count = _deck.pageCount();
-    if (count < 2)
-        return;
     post(
         [count](const PagedDocument& document) {
             std::vector<Size> sizes;
@@ -145,6 +143,9 @@ void PreviewPagesView::drawNext()
 void PreviewPagesView::drew(const PageDeck::Task& task, std::optional<Image> picture)
 {
     _isDrawing = false;
+    // Only now: the first page that somebody waits for does not wait for the sizes of the others.
+    if (!std::exchange(_knowsSizes, true))
+        readPageSizes();
     _deck.finish(task, std::move(picture), _visible);
     needsDisplay();
     drawNext();

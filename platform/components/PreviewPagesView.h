@@ -88,7 +88,7 @@ private:
     Rect _visible;
     std::size_t _currentPage = 0;
     unsigned _generation = 0; ///< of the document; what arrives for an older one is dropped
-    bool _isDrawing = false, _isSelecting = false;
+    bool _isDrawing = false, _isSelecting = false, _knowsSizes = false;
     std::shared_ptr<Queue> _drawing, _reading;
 
     unsigned _searchGeneration = 0;

@@ -1,4 +1,5 @@
 #include "host/system/GdkPixbufImageLoader.h"
+#include "host/system/JpegEnd.h"
 #include "tests/support/TemporaryDirectory.h"
 
 #include <gtest/gtest.h>
@@ -98,6 +99,35 @@ TEST(ImageLoader, ReadsTheFramesOfAnAnimation)
     const auto half = loader.loadPicture(folder.write("half.gif", gif.substr(0, gif.size() - 6)), {}, never);
     ASSERT_TRUE(half);
     EXPECT_TRUE(half->breaksOff);
+}
+
+struct EndRow {
+    const char* name;
+    std::string_view bytes;
+    bool isMissing;
+};
+
+TEST(JpegEnd, IsFoundBehindThePictureOnly)
+{
+    using namespace std::string_view_literals;
+    const EndRow rows[] = {
+        {"whole", "\xFF\xD8\xFF\xE0\0\4ab\xFF\xDA\0\2pixels\xFF\xD9"sv, false},
+        {"whole, with more behind it", "\xFF\xD8\xFF\xDA\0\2\xFF\xD9 and a film"sv, false},
+        {"fill bytes before a mark", "\xFF\xD8\xFF\xFF\xFF\xDA\0\2\xFF\xD9"sv, false},
+        {"broken off", "\xFF\xD8\xFF\xE0\0\4ab\xFF\xDA\0\2pixels\xFF"sv, true},
+        {"with an end in its small picture alone", "\xFF\xD8\xFF\xE1\0\4\xFF\xD9\xFF\xDA\0\2pixels"sv, true},
+        {"broken off within a segment", "\xFF\xD8\xFF\xE1\1\0short"sv, true},
+        {"another format", "GIF89a"sv, false},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        host::system::JpegEnd whole, pieces;
+        whole.feed(row.bytes);
+        for (const char byte : row.bytes)
+            pieces.feed({&byte, 1});
+        EXPECT_EQ(whole.isMissing(), row.isMissing);
+        EXPECT_EQ(pieces.isMissing(), row.isMissing);
+    }
 }
 
 TEST(ImageLoader, DoesNotWaitForAPipe)
