@@ -59,6 +59,7 @@ TextNative::TextNative(const std::shared_ptr<PreviewTextView>& view)
     , _buffer(ObjectRef<GtkSourceBuffer>::adopt(gtk_source_buffer_new(nullptr)))
     , _style(ObjectRef<GtkCssProvider>::adopt(gtk_css_provider_new()))
     , _text(gtk_source_view_new_with_buffer(_buffer.get()))
+    , _marked(nullptr)
 {
     build();
 }
@@ -73,6 +74,8 @@ void TextNative::build()
 {
     gtk_source_buffer_set_highlight_matching_brackets(_buffer.get(), FALSE);
     gtk_text_buffer_set_enable_undo(GTK_TEXT_BUFFER(_buffer.get()), FALSE);
+    _marked = gtk_text_buffer_create_tag(
+        GTK_TEXT_BUFFER(_buffer.get()), nullptr, "background", "#ff7800", "foreground", "#000000", nullptr);
     auto* text = textView();
     gtk_text_view_set_editable(text, FALSE);
     gtk_text_view_set_cursor_visible(text, FALSE);
@@ -251,6 +254,7 @@ void TextNative::previewQueryDidChange()
     const auto view = _view.lock();
     if (!view)
         return;
+    unmarkMatch();
     if (view->query().empty()) {
         _search.reset();
         return;
@@ -306,11 +310,29 @@ void TextNative::matched(GAsyncResult* result, MatchStep step)
     const bool found = finish(context, result, &start, &end, nullptr, nullptr) != FALSE;
     if (found && context == _search.get()) {
         gtk_text_buffer_select_range(GTK_TEXT_BUFFER(_buffer.get()), &start, &end);
+        markMatch(start, end);
         gtk_text_view_scroll_to_mark(
             textView(), gtk_text_buffer_get_insert(GTK_TEXT_BUFFER(_buffer.get())), 0.1, FALSE, 0, 0);
     }
     g_object_unref(context);
     publishSearch();
+}
+
+/// Stands out among the other matches, also while the search field has the focus.
+void TextNative::markMatch(const GtkTextIter& start, const GtkTextIter& end)
+{
+    unmarkMatch();
+    auto* buffer = GTK_TEXT_BUFFER(_buffer.get());
+    gtk_text_tag_set_priority(
+        _marked, gtk_text_tag_table_get_size(gtk_text_buffer_get_tag_table(buffer)) - 1);
+    gtk_text_buffer_apply_tag(buffer, _marked, &start, &end);
+}
+
+void TextNative::unmarkMatch()
+{
+    GtkTextIter start, end;
+    gtk_text_buffer_get_bounds(GTK_TEXT_BUFFER(_buffer.get()), &start, &end);
+    gtk_text_buffer_remove_tag(GTK_TEXT_BUFFER(_buffer.get()), _marked, &start, &end);
 }
 
 void TextNative::publishSearch()

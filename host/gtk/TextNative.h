@@ -38,6 +38,8 @@ private:
     void searchFrom(const GtkTextIter& place, platform::components::MatchStep step);
     void matched(GAsyncResult* result, platform::components::MatchStep step);
     void publishSearch();
+    void markMatch(const GtkTextIter& start, const GtkTextIter& end);
+    void unmarkMatch();
 
     std::weak_ptr<platform::components::PreviewTextView> _view;
     ObjectRef<GtkWidget> _window;
@@ -46,6 +48,7 @@ private:
     ObjectRef<GtkSourceLanguage> _language;
     ObjectRef<GtkCssProvider> _style;
     GtkWidget* _text;
+    GtkTextTag* _marked; ///< the buffer's, for the match that the search stands at
     std::string _shown; ///< what the buffer has or is about to have
     std::size_t _inserted = 0, _insertEnd = 0; ///< bytes of `_shown`: what is missing in the buffer
     ObjectRef<GtkTextMark> _insertPlace;
