@@ -17,8 +17,10 @@ namespace {
 
 /// The toolkit keeps about this many rows as widgets, whatever the screen shows; more rows cost nothing.
 constexpr std::size_t livingRows = 220;
-/// How many of them are made in one frame, so that a frame stays a frame: the first fill a tall screen.
-constexpr std::size_t firstRows = 24, moreRows = 12;
+/// How many of them are made in one frame, so that a frame stays a frame.
+constexpr std::size_t moreRows = 8;
+/// The first fill the list, whose height is not known before its first layout, but no very tall screen.
+constexpr std::size_t fewestFirstRows = 12, mostFirstRows = 24;
 /// The widgets take so many single changes at once; more are told in one away from what is seen.
 constexpr std::size_t mostSplices = 16;
 constexpr double markDragStart = 8; ///< points; a finger that only taps moves less
@@ -281,6 +283,9 @@ void ListViewPeer::showRows(std::size_t count)
     const std::size_t known = g_list_model_get_n_items(_rows.get());
     if (known == count)
         return;
+    const auto list = _list.lock();
+    const auto firstRows =
+        std::clamp(list ? list->visibleRows().count + 1 : 0, fewestFirstRows, mostFirstRows);
     // A list that is far enough is complete at once; one that begins grows into its rows.
     const auto next =
         known >= livingRows || count <= firstRows ? count : std::min(count, std::max(known, firstRows));

@@ -108,7 +108,9 @@ void WatchedListing::folderChanged()
 {
     if (std::exchange(_isReadingSoon, true))
         return;
-    const auto pause = std::max(changesSettle, pauseFactor * _readingTook);
+    const Duration sinceReading(
+        _dispatch->now().nanoseconds - _readingBegan.nanoseconds - _readingTook.count());
+    const auto pause = std::max(changesSettle, pauseFactor * _readingTook - sinceReading);
     _dispatch->after(pause, _dispatch->mainQueue(), [weak = weak_from_this()] {
         if (const auto self = weak.lock()) {
             self->_isReadingSoon = false;

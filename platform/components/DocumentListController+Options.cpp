@@ -34,6 +34,7 @@ void DocumentListController::setOrder(const ListOrder& order)
         return;
     _order = order;
     saveOrder(*_presentedURL, order);
+    _isReordered = true;
     refresh();
 }
 

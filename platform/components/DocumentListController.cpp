@@ -193,7 +193,14 @@ void DocumentListController::contentsDidChange(const FolderContentsUpdate& updat
     _failure = update.error;
     _rows->setRows(update.rows);
     _rows->invalidateDetails();
-    _listView->apply(update.changes);
+    if (std::exchange(_isReordered, false)) {
+        // Nearly every row has moved: one begins at the top again.
+        _hasTakenKeyboard = false;
+        _listView->reloadAll();
+        _listView->scrollToRow(0, ui::RowPosition::Top, false);
+    } else {
+        _listView->apply(update.changes);
+    }
     _rows->visibleRowsDidChange();
     if (update.stage != ListingStage::FirstRows)
         _listView->endRefreshing();

@@ -156,6 +156,7 @@ private:
     std::optional<ListingStage> _state; ///< of the latest update; nothing before the first
     std::optional<Error> _failure;
     bool _wasRemoved = false, _reportedRemoval = false, _hasTakenKeyboard = false;
+    bool _isReordered = false; ///< the next update brings another order
 };
 
 /// How a list reads in a log line.

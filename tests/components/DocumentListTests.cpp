@@ -471,9 +471,12 @@ TEST_F(DocumentList, ShowsItsItemsInTheChosenOrder)
     deliver(list, entries);
     list->setEditingAnimated(true, false);
     list->setSelectedItems({drive.url("Stuff/c.txt")});
+    const auto observer = std::make_shared<RecordingListObserver>();
+    list->listView()->setListObserver(observer);
     for (const auto& row : rows) {
         list->setOrder(row.order);
         deliver(list, entries);
+        EXPECT_EQ(std::exchange(observer->resets, 0), 1) << "another order is another list";
         EXPECT_EQ(titles(list), row.titles);
         EXPECT_EQ(list->selectedItems(), std::vector{drive.url("Stuff/c.txt")});
         EXPECT_EQ(shownList(drive.url("Stuff"))->order(), row.order) << "kept for the folder";
