@@ -23,12 +23,12 @@ GtkWidget* makeIconButton(const char* icon, const std::string& name)
 }
 
 /// A key that presses a button wherever the keyboard is, as long as the button is shown.
-void addShortcut(GtkWidget* button, guint key)
+void addShortcut(GtkWidget* button, guint key, GdkModifierType modifiers = static_cast<GdkModifierType>(0))
 {
     auto* shortcuts = gtk_shortcut_controller_new();
     gtk_shortcut_controller_set_scope(GTK_SHORTCUT_CONTROLLER(shortcuts), GTK_SHORTCUT_SCOPE_GLOBAL);
     gtk_shortcut_controller_add_shortcut(GTK_SHORTCUT_CONTROLLER(shortcuts),
-        gtk_shortcut_new(gtk_keyval_trigger_new(key, static_cast<GdkModifierType>(0)),
+        gtk_shortcut_new(gtk_keyval_trigger_new(key, modifiers),
             GTK_SHORTCUT_ACTION(g_object_ref(gtk_activate_action_get()))));
     gtk_widget_add_controller(button, shortcuts);
 }
@@ -49,6 +49,7 @@ NavigationBarPeer::NavigationBarPeer(std::shared_ptr<PeerContext> context)
     adw_header_bar_pack_end(bar, _menu);
     addShortcut(_menu, GDK_KEY_F10);
     adw_header_bar_pack_end(bar, _search);
+    addShortcut(_search, GDK_KEY_f, GDK_CONTROL_MASK);
     _connections.push_back(connectSignal<void()>(_menu, "clicked", [this] {
         if (const auto make = _makeMenu)
             showMenu(_menu, gtk_widget_get_width(_menu) / 2.0, gtk_widget_get_height(_menu), make());

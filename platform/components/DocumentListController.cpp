@@ -135,7 +135,8 @@ void DocumentListController::offerSearch()
     if (!shouldShowSearch() || _editing)
         return navigationItem().setSearchAction({});
     navigationItem().setSearchAction([weak = std::weak_ptr(self())] {
-        if (const auto list = weak.lock())
+        // A key reaches the button also while something lies over the list.
+        if (const auto list = weak.lock(); list && !list->presentedViewController())
             list->startSearchWithQueryStringBecomeFirstResponder({}, true);
     });
 }
