@@ -24,6 +24,12 @@ std::string baseFolder(const char* variable, std::string_view belowHome)
     return folder + "/tarrow-drive";
 }
 
+std::string stateFromEnvironment()
+{
+    const auto folder = environment("TARROW_DRIVE_STATE");
+    return folder.empty() ? folder : std::filesystem::absolute(folder).lexically_normal().string();
+}
+
 // The one account that the local store itself provides.
 constexpr std::string_view localAccountFolder = "/local";
 
@@ -32,7 +38,7 @@ constexpr std::string_view localAccountFolder = "/local";
 DriveLayout DriveLayout::fromEnvironment()
 {
     if (const auto home = environment("TARROW_DRIVE_HOME"); !home.empty())
-        return at(std::filesystem::absolute(home).lexically_normal().string());
+        return at(std::filesystem::absolute(home).lexically_normal().string(), stateFromEnvironment());
     return at(baseFolder("XDG_DATA_HOME", "/.local/share") + std::string(localAccountFolder),
         baseFolder("XDG_STATE_HOME", "/.local/state"));
 }

@@ -16,7 +16,8 @@ public:
     /// The folder inside any other container that holds its documents.
     static constexpr std::string_view documentsFolderName = "Documents";
 
-    /// `$TARROW_DRIVE_HOME`, else the local account's folder below `$XDG_DATA_HOME/tarrow-drive/`.
+    /// `$TARROW_DRIVE_HOME`, else the local account's folder below `$XDG_DATA_HOME/tarrow-drive/`. A home of
+    /// the environment's choice keeps the state inside, unless `$TARROW_DRIVE_STATE` says where.
     static DriveLayout fromEnvironment();
     /// A layout at a folder; `state` empty means a folder inside it.
     static DriveLayout at(std::string home, std::string state = {});

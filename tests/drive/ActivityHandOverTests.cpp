@@ -191,6 +191,19 @@ TEST_F(HandOver, tellsTheSameDeviceByItsFile)
     EXPECT_NE(second.identifier, first.identifier);
 }
 
+TEST_F(HandOver, isBetweenProgramsWithStateFoldersOfTheirOwn)
+{
+    ::setenv("TARROW_DRIVE_HOME", drive.layout().home().c_str(), 1);
+    const auto alone = DriveLayout::fromEnvironment().prepare();
+    ::setenv("TARROW_DRIVE_STATE", drive.folder().at("other").c_str(), 1);
+    const auto other = DriveLayout::fromEnvironment().prepare();
+    ::unsetenv("TARROW_DRIVE_STATE");
+    ::unsetenv("TARROW_DRIVE_HOME");
+    EXPECT_EQ(alone.device(), drive.layout().device());
+    EXPECT_EQ(other.device(), drive.folder().at("other/device"));
+    EXPECT_EQ(other.activities(), alone.activities());
+}
+
 TEST_F(HandOver, offersOnlyWhatIsRecentAndOfThisAccountAndCanBeOpenedHere)
 {
     struct Row {
