@@ -48,6 +48,18 @@ std::size_t rowCountBefore(const ui::ListView& list, const ui::ListChanges& chan
     return count;
 }
 
+/// Few enough splices that leave the rows with widgets alone, or at least those that are seen: a row that
+/// goes and comes again has to be filled again.
+std::vector<ui::ListSplice> splicesToTell(const ui::RowRange& visible, const ui::ListChanges& changes)
+{
+    if (changes.splices.size() <= mostSplices)
+        return changes.splices;
+    const auto before = std::min(visible.first, livingRows / 2);
+    auto splices =
+        changes.splicesExactWithin({visible.first - before, before + visible.count + livingRows / 2});
+    return splices.size() <= mostSplices ? splices : changes.splicesExactWithin(visible);
+}
+
 } // namespace
 
 ListViewPeer::ListViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::ListView>& list)
@@ -274,6 +286,7 @@ void ListViewPeer::mirror(ui::View& shown, ui::ViewChanges changes)
     list->setScrollObserver(observing<ui::ScrollObserver>(*this));
     list->setListObserver(observing<ui::ListViewObserver>(*this));
     showRows(list->rowCount());
+    _refreshesAll = true;
     refreshRows();
     refreshStateDidChange(*list);
 }
@@ -321,8 +334,7 @@ void ListViewPeer::rowsDidChange(ui::ListView& list, const ui::ListChanges& chan
     const auto focusedAt = focused ? std::optional(ListRowWidget::position(focused)) : std::nullopt;
     // A list that still grows shows its beginning only: its rows are read anew instead.
     if (g_list_model_get_n_items(_rows.get()) == rowCountBefore(list, changes)) {
-        const bool isMuch = changes.splices.size() > mostSplices;
-        for (const auto& splice : isMuch ? changes.splicesExactWithin(list.visibleRows()) : changes.splices)
+        for (const auto& splice : splicesToTell(list.visibleRows(), changes))
             RowModel::splice(_rows.get(), static_cast<guint>(splice.position),
                 static_cast<guint>(splice.removed), static_cast<guint>(splice.inserted));
     }
@@ -333,9 +345,10 @@ void ListViewPeer::rowsDidChange(ui::ListView& list, const ui::ListChanges& chan
         focusSoon(std::min<std::size_t>(*focusedAt, list.rowCount() - 1), focusFrames);
 }
 
-void ListViewPeer::rowDidChange(ui::ListView&, std::size_t /*index*/)
+void ListViewPeer::rowDidChange(ui::ListView&, std::size_t index)
 {
-    refreshRowsLater();
+    _changedRows.insert(index);
+    context().scheduler().schedule(&_refreshKey, [this] { refreshRows(); });
 }
 
 void ListViewPeer::selectionDidChange(ui::ListView&)
@@ -345,13 +358,18 @@ void ListViewPeer::selectionDidChange(ui::ListView&)
 
 void ListViewPeer::refreshRowsLater()
 {
+    _refreshesAll = true;
     context().scheduler().schedule(&_refreshKey, [this] { refreshRows(); });
 }
 
 void ListViewPeer::refreshRows()
 {
-    for (auto* item : _live)
-        bindRow(item);
+    const bool all = std::exchange(_refreshesAll, false);
+    const auto changed = std::exchange(_changedRows, {});
+    for (auto* item : _live) {
+        if (all || changed.contains(gtk_list_item_get_position(item)))
+            bindRow(item);
+    }
     if (!_live.empty())
         noteFirstList(_listWidget);
 }

@@ -73,6 +73,8 @@ private:
     ObjectRef<GListModel> _rows;
     GtkWidget *_listWidget = nullptr, *_window = nullptr, *_refresher = nullptr, *_spinner = nullptr;
     std::unordered_set<GtkListItem*> _live;
+    std::unordered_set<std::size_t> _changedRows; ///< to be shown anew in the next frame
+    bool _refreshesAll = false; ///< all rows are
     SignalConnection _onScroll;
     platform::ui::TypeAhead _typeAhead;
     int _focusKey = 0; ///< its address names the focusing of a row in the scheduler

@@ -22,29 +22,15 @@ bool opensAsFolder(FolderEntryKind kind)
     return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
 }
 
-/// What kind of item a row stands for, to be said beside its name.
-std::string spokenKind(const FolderEntry& entry)
-{
-    if (entry.kind == FolderEntryKind::Library)
-        return localized("App library");
-    if (entry.kind == FolderEntryKind::Folder)
-        return localized("Folder");
-    if (entry.kind == FolderEntryKind::Link)
-        return {}; // the details say so
-    const auto& types = services().typeRegistry();
-    const auto type = types.typeForExtension(nameExtension(entry.name));
-    return type ? types.description(*type).value_or(std::string()) : std::string();
-}
-
 std::string spokenDescription(
-    const ui::ListRow& row, const FolderEntry& entry, const std::vector<std::string>& tagNames)
+    const ui::ListRow& row, const std::string& kind, const std::vector<std::string>& tagNames)
 {
     std::string spoken = row.title;
     const auto add = [&spoken](const std::string& part) {
         if (!part.empty())
             spoken += ", " + part;
     };
-    add(spokenKind(entry));
+    add(kind);
     add(row.detail);
     if (row.download == ui::DownloadState::Downloading)
         add(localized("Downloading"));
@@ -116,8 +102,8 @@ ui::ListRow DocumentRowSource::rowAtIndex(const ui::ListView&, std::size_t index
         row.image = known->second.thumbnail;
     if (_places)
         row.detail = _places(_rows->url(index)) + (row.detail.empty() ? "" : " · " + row.detail);
-    row.accessibleDescription =
-        spokenDescription(row, entry, isKnown ? known->second.details.tagNames : std::vector<std::string>());
+    row.accessibleDescription = spokenDescription(
+        row, spokenKind(entry), isKnown ? known->second.details.tagNames : std::vector<std::string>());
     return row;
 }
 
@@ -154,6 +140,33 @@ const std::string& DocumentRowSource::documentIcon(std::string_view name) const
     const auto type = types.typeForExtension(extension);
     return _iconsByExtension.emplace(extension, type ? types.iconName(*type) : plainDocumentIcon)
         .first->second;
+}
+
+const std::string& DocumentRowSource::documentKind(std::string_view name) const
+{
+    const std::string extension(nameExtension(name));
+    const auto known = _kindsByExtension.find(extension);
+    if (known != _kindsByExtension.end())
+        return known->second;
+    const auto& types = services().typeRegistry();
+    const auto type = types.typeForExtension(extension);
+    auto described = type ? types.description(*type).value_or(std::string()) : std::string();
+    return _kindsByExtension.emplace(extension, std::move(described)).first->second;
+}
+
+/// What kind of item a row stands for, to be said beside its name.
+std::string DocumentRowSource::spokenKind(const FolderEntry& entry) const
+{
+    switch (entry.kind) {
+    case FolderEntryKind::Library:
+        return localized("App library");
+    case FolderEntryKind::Folder:
+        return localized("Folder");
+    case FolderEntryKind::Link:
+        return {}; // the details say so
+    default:
+        return documentKind(entry.name);
+    }
 }
 
 void DocumentRowSource::visibleRowsDidChange()

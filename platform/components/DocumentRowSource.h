@@ -71,6 +71,8 @@ private:
     void complete(ui::ListRow& row, const RowDetails& details) const;
     Image iconFor(std::size_t index, const FolderEntry& entry) const;
     const std::string& documentIcon(std::string_view name) const;
+    const std::string& documentKind(std::string_view name) const;
+    std::string spokenKind(const FolderEntry& entry) const;
 
     std::weak_ptr<ui::ListView> _list;
     std::shared_ptr<const DocumentRows> _rows;
@@ -79,7 +81,7 @@ private:
     TagColors _tagColors;
     Places _places;
     std::unordered_map<ui::RowId, Known> _known;
-    mutable std::unordered_map<std::string, std::string> _iconsByExtension;
+    mutable std::unordered_map<std::string, std::string> _iconsByExtension, _kindsByExtension;
 };
 
 } // namespace platform::components
