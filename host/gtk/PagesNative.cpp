@@ -101,12 +101,12 @@ void PagesNative::addSelection()
         keys, "key-pressed", [this](guint key, guint, GdkModifierType modifiers) -> gboolean {
             if ((modifiers & GDK_CONTROL_MASK) == 0 || key != GDK_KEY_c)
                 return FALSE;
-            copySelection();
+            previewShouldCopy();
             return TRUE;
         }));
 }
 
-void PagesNative::copySelection()
+void PagesNative::previewShouldCopy()
 {
     const auto view = _view.lock();
     const auto text = view ? view->selectedText() : std::string();

@@ -22,6 +22,7 @@ public:
     void previewZoomDidChange() override;
     void previewShouldScrollTo(const platform::Rect& content) override;
     void previewShouldTakeFocus() override;
+    void previewShouldCopy() override;
 
 private:
     using View = platform::components::PreviewPagesView;
@@ -41,7 +42,6 @@ private:
     void drawMarks(GtkSnapshot* snapshot, const View& view, std::size_t page);
     void drawBroken(GtkSnapshot* snapshot, const platform::Rect& frame);
     void addSelection();
-    void copySelection();
     void updateLabel();
 
     std::weak_ptr<View> _view;

@@ -263,8 +263,10 @@ void PreviewPagesView::clearSelection()
 {
     _wantedSelection.reset();
     ++_selectionGeneration;
-    if (!std::exchange(_selection, {}).empty())
-        needsDisplay();
+    if (std::exchange(_selection, {}).empty())
+        return;
+    needsDisplay();
+    stateDidChange();
 }
 
 /// While one selection is read, only the latest that is wanted waits.
@@ -297,6 +299,7 @@ void PreviewPagesView::readSelection()
                 if (view._selectionGeneration == generation)
                     view._selection = found;
                 view.needsDisplay();
+                view.stateDidChange();
                 view.readSelection();
             };
         },

@@ -34,6 +34,7 @@ public:
 
     bool canZoom() const override { return true; }
     bool canSearch() const override { return true; }
+    bool canCopy() const override { return !_selection.empty(); }
 
     std::size_t pageCount() const { return _deck.pageCount(); }
     std::size_t currentPage() const { return _currentPage; } ///< counted from 0

@@ -29,12 +29,14 @@ std::shared_ptr<PreviewToolbar> PreviewToolbar::create()
 void PreviewToolbar::build()
 {
     _find = symbolButton("system-search-symbolic", localized("Search in document"));
+    _copy = symbolButton("edit-copy-symbolic", localized("Copy"));
     _zoomOut = symbolButton("zoom-out-symbolic", localized("Smaller"));
     _zoomIn = symbolButton("zoom-in-symbolic", localized("Larger"));
     _page = std::make_shared<ui::Label>();
     _page->setFont(ui::Font::preferred(ui::TextStyle::Footnote));
     _page->setAlignment(ui::TextAlignment::Center);
-    for (const auto& part : std::initializer_list<std::shared_ptr<ui::View>>{_find, _page, _zoomOut, _zoomIn})
+    for (const auto& part :
+        std::initializer_list<std::shared_ptr<ui::View>>{_find, _copy, _page, _zoomOut, _zoomIn})
         addSubview(part);
     const auto self = std::static_pointer_cast<PreviewToolbar>(shared_from_this());
     const auto act = [weak = std::weak_ptr(self)](auto action) {
@@ -46,6 +48,10 @@ void PreviewToolbar::build()
     _find->setAction(act([](PreviewToolbar& bar) {
         if (const auto call = bar._onFind)
             call();
+    }));
+    _copy->setAction(act([](PreviewToolbar& bar) {
+        if (const auto preview = bar._preview.lock())
+            preview->copy();
     }));
     _zoomOut->setAction(act([](PreviewToolbar& bar) { bar.zoomBy(1 / PreviewView::zoomStep); }));
     _zoomIn->setAction(act([](PreviewToolbar& bar) { bar.zoomBy(PreviewView::zoomStep); }));
@@ -84,6 +90,7 @@ void PreviewToolbar::update()
     const auto preview = _preview.lock();
     const bool zooms = preview && preview->canZoom();
     _find->setHidden(!preview || !preview->canSearch());
+    _copy->setHidden(!preview || !preview->canCopy());
     _zoomOut->setHidden(!zooms);
     _zoomIn->setHidden(!zooms);
     _zoomOut->setEnabled(zooms && preview->zoom() > PreviewView::minZoom);
@@ -102,6 +109,7 @@ void PreviewToolbar::layoutSubviews()
         view.setFrame({isMirrored ? width - x - itemWidth : x, 0, itemWidth, barHeight});
     };
     place(*_find, 0, barHeight);
+    place(*_copy, barHeight, barHeight);
     place(*_page, 2 * barHeight, std::max(0.0, width - 4 * barHeight));
     place(*_zoomOut, width - 2 * barHeight, barHeight);
     place(*_zoomIn, width - barHeight, barHeight);

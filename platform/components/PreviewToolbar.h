@@ -33,6 +33,10 @@ public:
     bool isEmpty() const; ///< there is nothing to press
 
     const std::shared_ptr<ui::Button>& findButton() const { return _find; }
+    const std::shared_ptr<ui::Button>& copyButton() const
+    {
+        return _copy;
+    } ///< shown while something is selected
     const std::shared_ptr<ui::Button>& zoomOutButton() const { return _zoomOut; }
     const std::shared_ptr<ui::Button>& zoomInButton() const { return _zoomIn; }
     const std::shared_ptr<ui::Label>& pageLabel() const { return _page; }
@@ -45,7 +49,7 @@ private:
     std::string pageText() const;
 
     std::weak_ptr<PreviewView> _preview;
-    std::shared_ptr<ui::Button> _find, _zoomOut, _zoomIn;
+    std::shared_ptr<ui::Button> _find, _copy, _zoomOut, _zoomIn;
     std::shared_ptr<ui::Label> _page;
     std::function<void()> _onFind;
 };

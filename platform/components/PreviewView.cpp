@@ -56,6 +56,11 @@ void PreviewView::takeFocus()
     _native.notify([](auto& native) { native.previewShouldTakeFocus(); });
 }
 
+void PreviewView::copy()
+{
+    _native.notify([](auto& native) { native.previewShouldCopy(); });
+}
+
 void PreviewView::userWantsToFind()
 {
     if (const auto call = _onFind)

@@ -33,6 +33,7 @@ public:
     virtual void previewShouldScrollTo(const Rect& /*place in the content*/) { }
     virtual void previewShouldStop() { } ///< it is no longer seen: nothing plays on
     virtual void previewShouldTakeFocus() { }
+    virtual void previewShouldCopy() { } ///< what is selected, to the clipboard
 };
 
 /// The view of a document's content, with what its toolbar and keys act on. The host makes the native view by
@@ -46,6 +47,8 @@ public:
 
     virtual bool canZoom() const { return false; }
     virtual bool canSearch() const { return false; }
+    /// Whether something is selected that only a command of ours copies.
+    virtual bool canCopy() const { return false; }
 
     static constexpr double minZoom = 1, maxZoom = 12; ///< 1 fits the window
     static constexpr double zoomStep = 1.5; ///< of the buttons and keys
@@ -63,6 +66,7 @@ public:
 
     void stop(); ///< it is no longer seen
     void takeFocus();
+    void copy();
 
     /// Called whenever what a toolbar shows of this view has changed.
     void setOnStateChange(std::function<void()> callback) { _onStateChange = std::move(callback); }

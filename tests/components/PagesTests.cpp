@@ -247,11 +247,13 @@ TEST_F(Pages, SelectsTextAcrossPages)
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(view->selectedText(), "first\nsecond");
     EXPECT_FALSE(view->selection().at(0).places.empty());
+    EXPECT_TRUE(view->canCopy());
 
     view->userSelects(from, to);
     view->clearSelection();
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(view->selectedText(), "");
+    EXPECT_FALSE(view->canCopy());
 }
 
 TEST_F(Pages, StopsWorkingOnADocumentThatIsNoLongerShown)
