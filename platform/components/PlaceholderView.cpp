@@ -14,6 +14,7 @@ namespace {
 
 constexpr double margin = 24;
 constexpr double lineSpacing = 12;
+constexpr double iconAlpha = 0.5; ///< what is said is in the words
 
 std::shared_ptr<ui::Label> makeLabel(const ui::Font& font)
 {
@@ -45,6 +46,7 @@ void PlaceholderView::build()
     _spinner = std::make_shared<ui::ActivityIndicator>();
     _icon = std::make_shared<ui::ImageView>();
     _icon->setContentMode(ui::ContentMode::AspectFit);
+    _icon->setAlpha(iconAlpha);
     _icon->setAccessibility({.label = {}, .hint = {}, .isHidden = true});
     _title = makeLabel(ui::Font::preferred(ui::TextStyle::Title2).bold());
     _message = makeLabel(ui::Font::preferred(ui::TextStyle::Body));

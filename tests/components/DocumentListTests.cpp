@@ -114,6 +114,8 @@ TEST_F(DocumentList, ShowsEveryKindOfItemWithItsDetails)
         EXPECT_TRUE(isValidUtf8(shown.title));
     }
     EXPECT_EQ(list->listView()->row(1).title, "bad\xEF\xBF\xBDname");
+    EXPECT_THAT(list->listView()->row(0).accessibleDescription,
+        testing::AllOf(testing::StartsWith("Trip, Folder, "), HasSubstr(rows[0].detail)));
     EXPECT_THAT(list->listView()->row(2).accessibleDescription,
         testing::AllOf(HasSubstr("Far.pdf"), HasSubstr("In the cloud"), HasSubstr("Work")));
 }
