@@ -210,10 +210,21 @@ void NavigationPeer::ensurePageBelowTop()
     adw_leaflet_reorder_child_after(leaflet(), top->widget(), page->widget());
     adw_leaflet_set_visible_child(leaflet(), top->widget());
     _mirroring = false;
+    hideAllButTop();
+}
+
+/// The leaflet does not show its other pages, but leaves them to assistive technology.
+void NavigationPeer::hideAllButTop() const
+{
+    const auto top = topPage();
+    for (const auto& page : _pages)
+        gtk_accessible_update_state(
+            GTK_ACCESSIBLE(page->widget()), GTK_ACCESSIBLE_STATE_HIDDEN, page != top ? TRUE : FALSE, -1);
 }
 
 void NavigationPeer::updateAll()
 {
+    hideAllButTop();
     if (const auto stack = _navigation.lock())
         adw_leaflet_set_can_navigate_back(leaflet(), stack->canGoBack());
     for (const auto& page : _pages)

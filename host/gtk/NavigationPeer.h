@@ -49,6 +49,7 @@ private:
     void removeStalePages();
     void ensurePageBelowTop();
     void updateAll();
+    void hideAllButTop() const;
 
     std::shared_ptr<PeerContext> _context;
     std::weak_ptr<platform::ui::NavigationController> _navigation;
