@@ -39,6 +39,14 @@ constexpr CommandKey commandKeys[] = {
     {GDK_KEY_space, noModifiers, ui::RowCommand::Peek},
 };
 
+/// Whether a key goes somewhere or does something, and so ends what is being typed.
+bool endsTyping(guint key)
+{
+    const bool isFunction =
+        (key >= GDK_KEY_BackSpace && key < GDK_KEY_Shift_L) || key == GDK_KEY_Delete || key == GDK_KEY_Menu;
+    return isFunction && !g_unichar_isprint(gdk_keyval_to_unicode(key));
+}
+
 } // namespace
 
 GtkWidget* ListViewPeer::focusedRow() const
@@ -66,6 +74,8 @@ GtkWidget* ListViewPeer::rowAt(double x, double y) const
 bool ListViewPeer::keyPressed(guint key, GdkModifierType modifiers)
 {
     const auto keepsSelf = shared_from_this();
+    if (endsTyping(key))
+        _typeAhead.clear();
     const auto* row = focusedRow();
     if (row && rowKeyPressed(ListRowWidget::position(const_cast<GtkWidget*>(row)), key, modifiers))
         return true;
