@@ -29,18 +29,36 @@ std::string Accessible::name() const
     return answer;
 }
 
-bool Accessible::isVisible() const
+bool Accessible::hasState(AtspiStateType state) const
 {
     auto* states = atspi_accessible_get_state_set(_node.get());
-    const bool visible = states && atspi_state_set_contains(states, ATSPI_STATE_VISIBLE);
+    const bool has = states && atspi_state_set_contains(states, state);
     if (states)
         g_object_unref(states);
-    return visible;
+    return has;
+}
+
+std::string Accessible::text() const
+{
+    auto* content = atspi_accessible_get_text_iface(_node.get());
+    if (!content)
+        return {};
+    const int length = atspi_text_get_character_count(content, nullptr);
+    char* text = atspi_text_get_text(content, 0, length, nullptr);
+    std::string answer = text ? text : "";
+    g_free(text);
+    g_object_unref(content);
+    return answer;
+}
+
+bool Accessible::hasRole(AtspiRole role) const
+{
+    return atspi_accessible_get_role(_node.get(), nullptr) == role;
 }
 
 bool Accessible::isButton() const
 {
-    return atspi_accessible_get_role(_node.get(), nullptr) == ATSPI_ROLE_PUSH_BUTTON;
+    return hasRole(ATSPI_ROLE_PUSH_BUTTON);
 }
 
 bool Accessible::isEntry() const
@@ -51,7 +69,7 @@ bool Accessible::isEntry() const
 
 bool Accessible::isDialog() const
 {
-    return atspi_accessible_get_role(_node.get(), nullptr) == ATSPI_ROLE_DIALOG;
+    return hasRole(ATSPI_ROLE_DIALOG);
 }
 
 bool Accessible::enter(const std::string& text) const
@@ -72,6 +90,22 @@ bool Accessible::press() const
     const bool done =
         atspi_action_get_n_actions(action, nullptr) > 0 && atspi_action_do_action(action, 0, nullptr);
     g_object_unref(action);
+    return done;
+}
+
+bool Accessible::perform(const std::string& action) const
+{
+    auto* actions = atspi_accessible_get_action_iface(_node.get());
+    if (!actions)
+        return false;
+    bool done = false;
+    const int count = atspi_action_get_n_actions(actions, nullptr);
+    for (int i = 0; i < count && !done; ++i) {
+        char* name = atspi_action_get_action_name(actions, i, nullptr);
+        done = name && action == name && atspi_action_do_action(actions, i, nullptr);
+        g_free(name);
+    }
+    g_object_unref(actions);
     return done;
 }
 
@@ -97,13 +131,14 @@ std::vector<Accessible> Accessible::all(const std::function<bool(const Accessibl
     return found;
 }
 
-Accessible Accessible::application(const std::string& program)
+Accessible Accessible::application(const std::string& program, pid_t process)
 {
     const Accessible desktop(atspi_get_desktop(0));
     const int count = atspi_accessible_get_child_count(desktop._node.get(), nullptr);
     for (int i = 0; i < count; ++i) {
         const Accessible child(atspi_accessible_get_child_at_index(desktop._node.get(), i, nullptr));
-        if (child && child.name() == program)
+        const auto owner = static_cast<pid_t>(atspi_accessible_get_process_id(child._node.get(), nullptr));
+        if (child && owner == process && child.name() == program)
             return child;
     }
     return {};

@@ -1,0 +1,135 @@
+#include "DriveTests.h"
+
+#include <gmock/gmock.h>
+
+namespace e2e {
+namespace {
+
+constexpr unsigned returnKey = 0xff0d, escape = 0xff1b, deleteKey = 0xffff, f2 = 0xffbf, menuKey = 0xff67,
+                   down = 0xff54, up = 0xff52, space = ' ';
+
+/// All by the keyboard, as somebody without a pointer does it.
+class KeyboardTests : public DriveTests {
+protected:
+    void expectKeyboardAt(const std::string& beginning)
+    {
+        EXPECT_TRUE(eventually([&] { return program->hasKeyboardAt(beginning); })) << beginning;
+    }
+    void expectDialog(bool isShown)
+    {
+        EXPECT_TRUE(eventually([&] { return program->dialogs().empty() != isShown; }));
+    }
+    /// Goes to a document on the desktop.
+    void goTo(const std::string& letters, const std::string& name)
+    {
+        start();
+        expectKeyboardAt("Desktop");
+        pressKey(returnKey);
+        expectKeyboardAt("🎉 Birthdays");
+        type(letters);
+        expectKeyboardAt(name);
+    }
+    void expectKeyboardInEntry()
+    {
+        EXPECT_TRUE(eventually([this] {
+            const auto entries = program->entries();
+            return !entries.empty() && entries.back().isFocused();
+        }));
+    }
+    /// Puts another text in the place of the one in the entry.
+    void replaceText(const std::string& text)
+    {
+        expectKeyboardInEntry();
+        pressKey('a', Modifier::Control);
+        type(text);
+    }
+};
+
+TEST_F(KeyboardTests, LeadsThroughTheFolders)
+{
+    start();
+    expectKeyboardAt("Desktop");
+    pressKey(down);
+    expectKeyboardAt("Documents");
+    pressKey(returnKey);
+    expectKeyboardAt("Household");
+    type("read");
+    expectKeyboardAt("Reading notes");
+    pressKey(returnKey);
+    EXPECT_TRUE(eventually([this] { return program->document().find("Dispossessed") != std::string::npos; }));
+    pressKey(escape);
+    expectKeyboardAt("Reading notes");
+    pressKey(escape);
+    expectKeyboardAt("Documents");
+
+    pressKey('f', Modifier::Control);
+    expectKeyboardInEntry();
+    type("insur");
+    ASSERT_TRUE(eventually([this] { return program->shows("Insurance.pdf"); }));
+    pressKey(down);
+    expectKeyboardAt("Insurance.pdf");
+    pressKey(menuKey);
+    expectKeyboardAt("Show in Its Folder");
+    pressKey(returnKey);
+    EXPECT_TRUE(eventually([this] { return program->shows("Receipts") && program->entries().empty(); }));
+}
+
+TEST_F(KeyboardTests, ADocumentIsRenamedOnceItsNameIsAccepted)
+{
+    std::ofstream(top / "Desktop/Errands.txt") << "Buy flour";
+    goTo("to", "To do.txt");
+    pressKey(f2);
+    expectDialog(true);
+    replaceText("a/b");
+    EXPECT_TRUE(eventually([this] { return program->says("Character not allowed in filename"); }));
+    pressKey(returnKey);
+    pressKey(escape);
+    expectDialog(false);
+    expectKeyboardAt("To do.txt");
+
+    pressKey(f2);
+    expectDialog(true);
+    replaceText("Errands.txt");
+    pressKey(returnKey);
+    EXPECT_TRUE(eventually([this] { return program->says("Name is already taken"); }));
+    replaceText("Chores.txt");
+    pressKey(returnKey);
+    expectDialog(false);
+    EXPECT_TRUE(eventually([this] { return program->shows("Chores.txt"); }));
+    EXPECT_FALSE(program->shows("To do.txt"));
+    EXPECT_TRUE(std::filesystem::exists(top / "Desktop/Chores.txt"));
+}
+
+TEST_F(KeyboardTests, ADocumentIsSeenAndDeleted)
+{
+    goTo("pack", "Packing list.md");
+    pressKey(menuKey);
+    expectKeyboardAt("Info");
+    pressKey(escape);
+    EXPECT_TRUE(eventually([this] { return !program->shows("Info"); }));
+    expectKeyboardAt("Packing list.md");
+    pressKey(space);
+    expectDialog(true);
+    EXPECT_TRUE(eventually([this] { return !program->document().empty(); }));
+    pressKey(escape);
+    expectDialog(false);
+    expectKeyboardAt("Packing list.md");
+
+    pressKey(deleteKey);
+    expectKeyboardAt("Cancel");
+    pressKey(escape);
+    expectDialog(false);
+    EXPECT_TRUE(std::filesystem::exists(top / "Desktop/Packing list.md"));
+    expectKeyboardAt("Packing list.md");
+    pressKey(deleteKey);
+    expectKeyboardAt("Cancel");
+    pressKey(up);
+    expectKeyboardAt("Delete from Tarrow Drive");
+    pressKey(returnKey);
+    EXPECT_TRUE(eventually([this] { return !program->shows("Packing list.md"); }));
+    EXPECT_FALSE(std::filesystem::exists(top / "Desktop/Packing list.md"));
+    expectKeyboardAt("Recipes");
+}
+
+} // namespace
+} // namespace e2e

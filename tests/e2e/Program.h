@@ -1,0 +1,66 @@
+#pragma once
+
+#include "Accessible.h"
+
+#include <map>
+#include <string>
+#include <sys/types.h>
+#include <vector>
+
+namespace e2e {
+
+/// A running Tarrow Drive, driven through its accessibility tree and the keyboard. What it complains about
+/// while it runs, and an end that is not in order, fails the test.
+class Program {
+public:
+    using Environment = std::map<std::string, std::string>;
+
+    /// Starts the program with a changed environment, and waits until it shows its window.
+    explicit Program(const Environment& changes = {});
+    ~Program();
+
+    std::vector<Accessible> all(const std::function<bool(const Accessible&)>& matches) const
+    {
+        return _tree.all(matches);
+    }
+    /// The visible buttons and rows whose names begin so, the frontmost last.
+    std::vector<Accessible> buttons(const std::string& beginning) const;
+    bool shows(const std::string& beginning) const { return !buttons(beginning).empty(); }
+    /// Whether anything visible has exactly this name.
+    bool says(const std::string& name) const;
+    /// Whether the keyboard is at something whose name begins so.
+    bool hasKeyboardAt(const std::string& beginning) const;
+    /// The texts that a preview shows; empty: none.
+    std::string document() const;
+    std::vector<Accessible> entries() const;
+    /// The names of all that is visible, for the message of a test that fails.
+    std::string names() const;
+    std::vector<Accessible> dialogs() const;
+
+    /// Presses the frontmost button whose name begins so, once it is there.
+    void press(const std::string& beginning) const;
+    /// Presses a button again and again until that has an effect: a press that meets a bar which still slides
+    /// in is lost with the button.
+    void pressUntil(const std::string& beginning, const std::function<bool()>& effect) const;
+
+    /// Runs a command of this build to its end, with the environment of the tests.
+    static int run(const std::vector<std::string>& command, const Environment& changes = {});
+
+private:
+    static pid_t spawn(
+        const std::vector<std::string>& command, const Environment& changes, const std::string& errors);
+    void expectOrderlyEnd();
+
+    std::string _errors; ///< the file with what the program writes
+    pid_t _process = -1;
+    Accessible _tree;
+};
+
+enum class Modifier { None, Control, Shift };
+
+/// A key that the person presses, as a symbol of the X server.
+void pressKey(unsigned symbol, Modifier modifier = Modifier::None);
+/// Letters and digits that the person types.
+void type(const std::string& text);
+
+} // namespace e2e
