@@ -100,6 +100,7 @@ DriveFixture::DriveFixture()
 
 DriveFixture::~DriveFixture()
 {
+    dispatch->end();
     platform::installServices({});
     platform::installLogSink(nullptr);
 }

@@ -124,6 +124,8 @@ platform::Date VirtualDispatch::now() const
 void VirtualDispatch::submit(Duration delay, std::weak_ptr<const void> queue, Work work)
 {
     const std::lock_guard lock(_mutex);
+    if (_hasEnded)
+        return;
     _pending.push_back({_now + delay.count(), _nextOrder++, std::move(queue), std::move(work)});
 }
 
@@ -159,6 +161,17 @@ void VirtualDispatch::advance(double seconds)
     while (runNext(end)) { }
     const std::lock_guard lock(_mutex);
     _now = end;
+}
+
+void VirtualDispatch::end()
+{
+    // What is dropped may add work while it ends, so not under the lock.
+    std::vector<Pending> dropped;
+    {
+        const std::lock_guard lock(_mutex);
+        _hasEnded = true;
+        dropped.swap(_pending);
+    }
 }
 
 std::size_t VirtualDispatch::pendingCount() const

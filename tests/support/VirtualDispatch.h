@@ -31,6 +31,8 @@ public:
     void runUntilIdle();
     /// Moves the clock by seconds, running what falls due on the way at its own time.
     void advance(double seconds);
+    /// Drops all work that waits, and all that is added from now on: what it holds may hold the queues.
+    void end();
     /// How many pieces of work wait, timers included.
     std::size_t pendingCount() const;
 
@@ -51,6 +53,7 @@ private:
     std::int64_t _now =
         1'700'000'000'000'000'000; // a fixed moment of 2023, so that texts with dates do not change
     std::uint64_t _nextOrder = 0;
+    bool _hasEnded = false;
     std::thread::id _owner = std::this_thread::get_id();
     std::shared_ptr<platform::Queue> _mainQueue;
 };
