@@ -247,6 +247,8 @@ void ListViewPeer::scrolled()
 
 void ListViewPeer::showMenuOf(GtkWidget* row, double x, double y)
 {
+    // A row that gets the keyboard back now would take it from the menu, and so close it.
+    context().scheduler().cancel(&_focusKey);
     const auto list = _list.lock();
     if (!list)
         return;
@@ -323,9 +325,13 @@ void ListViewPeer::growRows()
 
 void ListViewPeer::rowsWereReset(ui::ListView& list)
 {
+    auto* focused = focusedRow();
+    const auto focusedAt = focused ? std::optional(ListRowWidget::position(focused)) : std::nullopt;
     RowModel::reset(_rows.get(), 0);
     showRows(list.rowCount());
     refreshRowsLater();
+    if (focusedAt && list.rowCount() > 0)
+        focusSoon(std::min<std::size_t>(*focusedAt, list.rowCount() - 1), focusFrames);
 }
 
 void ListViewPeer::rowsDidChange(ui::ListView& list, const ui::ListChanges& changes)

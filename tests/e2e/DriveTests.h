@@ -50,7 +50,7 @@ protected:
     {
         if (Accessible::waitFor(condition))
             return ::testing::AssertionSuccess();
-        return ::testing::AssertionFailure() << (program ? program->names() : "nothing runs");
+        return ::testing::AssertionFailure() << (program ? program->state() : "nothing runs");
     }
 
     std::filesystem::path home, documents, top;

@@ -42,6 +42,10 @@ protected:
         expectKeyboardInEntry();
         pressKey('a', Modifier::Control);
         type(text);
+        EXPECT_TRUE(eventually([&] {
+            const auto entries = program->entries();
+            return !entries.empty() && entries.back().text() == text;
+        }));
     }
 };
 
@@ -64,12 +68,11 @@ TEST_F(KeyboardTests, LeadsThroughTheFolders)
 
     pressKey('f', Modifier::Control);
     expectKeyboardInEntry();
-    type("insur");
-    ASSERT_TRUE(eventually([this] { return program->shows("Insurance.pdf"); }));
+    // At once, so that no result of half the text is there to be mistaken for the last ones.
+    EXPECT_TRUE(program->entries().back().enter("house"));
+    ASSERT_TRUE(eventually([this] { return program->shows("Household"); }));
     pressKey(down);
-    expectKeyboardAt("Insurance.pdf");
-    pressKey(menuKey);
-    expectKeyboardAt("Show in Its Folder");
+    expectKeyboardAt("Household");
     pressKey(returnKey);
     EXPECT_TRUE(eventually([this] { return program->shows("Receipts") && program->entries().empty(); }));
 }
@@ -83,12 +86,6 @@ TEST_F(KeyboardTests, ADocumentIsRenamedOnceItsNameIsAccepted)
     replaceText("a/b");
     EXPECT_TRUE(eventually([this] { return program->says("Character not allowed in filename"); }));
     pressKey(returnKey);
-    pressKey(escape);
-    expectDialog(false);
-    expectKeyboardAt("To do.txt");
-
-    pressKey(f2);
-    expectDialog(true);
     replaceText("Errands.txt");
     pressKey(returnKey);
     EXPECT_TRUE(eventually([this] { return program->says("Name is already taken"); }));

@@ -34,8 +34,7 @@ TEST_F(PreviewTests, ADocumentIsFollowedWhereverOthersTakeIt)
     program->press("Back");
     EXPECT_TRUE(eventually([this] { return program->shows("旅行メモ.txt"); })) << "not at its new place";
 
-    program->press("Chores.txt");
-    expectText(*program, "flour and eggs");
+    program->pressUntil("Chores.txt", [this] { return reads(*program, "flour and eggs"); });
     ASSERT_EQ(files({"remove", "Documents/Letters/Chores.txt"}), 0);
     EXPECT_TRUE(eventually([this] { return program->document().empty() && !program->shows("Chores.txt"); }));
     EXPECT_TRUE(program->shows("旅行メモ.txt"));

@@ -33,8 +33,8 @@ public:
     /// The texts that a preview shows; empty: none.
     std::string document() const;
     std::vector<Accessible> entries() const;
-    /// The names of all that is visible, for the message of a test that fails.
-    std::string names() const;
+    /// The names of all that is visible and the end of the log, for the message of a test that fails.
+    std::string state() const;
     std::vector<Accessible> dialogs() const;
 
     /// Presses the frontmost button whose name begins so, once it is there.
