@@ -25,8 +25,12 @@ namespace fs = std::filesystem;
 std::optional<Url> find(platform::DocumentIdentifiers& identifiers, std::uint32_t identifier)
 {
     const auto file = identifiers.resolve(identifier);
-    const auto open = file ? identifiers.open(*file).value : std::nullopt;
-    const auto found = open ? (*open)->attributes().value : std::nullopt;
+    if (!file)
+        return std::nullopt;
+    const auto open = identifiers.open(*file);
+    if (!open)
+        return std::nullopt;
+    const auto found = (*open)->attributes();
     return found && found->documentIdentifier == identifier ? std::optional(found->url) : std::nullopt;
 }
 
