@@ -25,12 +25,6 @@ char folded(char c)
     return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
 }
 
-bool holds(std::string_view name, std::string_view foldedText)
-{
-    const auto same = [](char a, char b) { return folded(a) == b; };
-    return std::search(name.begin(), name.end(), foldedText.begin(), foldedText.end(), same) != name.end();
-}
-
 /// What a row shows of its entry beside the name, in one number.
 unsigned appearance(const FolderEntry& entry)
 {
@@ -82,21 +76,6 @@ void DocumentRows::sort(const ListOrder& order)
     const auto ids = _ids;
     for (std::size_t row = 0; row < _indexes.size(); ++row)
         _ids[row] = ids[_indexes[row]];
-}
-
-std::shared_ptr<const DocumentRows> DocumentRows::matching(
-    std::shared_ptr<const FolderSnapshot> snapshot, std::string_view text)
-{
-    std::string sought(text);
-    std::transform(sought.begin(), sought.end(), sought.begin(), folded);
-    const std::shared_ptr<DocumentRows> rows(new DocumentRows(std::move(snapshot)));
-    for (std::size_t i = 0; i < rows->_snapshot->count(); ++i) {
-        if (!holds(rows->_snapshot->entry(i).name, sought))
-            continue;
-        rows->append(i);
-        rows->_indexes.push_back(static_cast<std::uint32_t>(i));
-    }
-    return rows;
 }
 
 void DocumentRows::append(std::size_t snapshotIndex)

@@ -15,15 +15,11 @@
 namespace platform::components {
 
 /// The rows that a folder list shows: the items of one snapshot in some order, with the identifiers of their
-/// rows, or those of them whose name holds a text. Immutable; any thread. To make one takes a pass over all
-/// names, and what orderedIndexes() takes.
+/// rows. Immutable; any thread. To make one takes a pass over all names, and what orderedIndexes() takes.
 class DocumentRows {
 public:
     static std::shared_ptr<const DocumentRows> make(
         std::shared_ptr<const FolderSnapshot> snapshot, const ListOrder& order = {});
-    /// The rows of a snapshot whose names hold a text; capital and small ASCII letters are the same.
-    static std::shared_ptr<const DocumentRows> matching(
-        std::shared_ptr<const FolderSnapshot> snapshot, std::string_view text);
 
     std::size_t count() const { return _ids.size(); }
     std::span<const ui::RowId> ids() const { return _ids; }
@@ -58,7 +54,7 @@ private:
 
     std::shared_ptr<const FolderSnapshot> _snapshot;
     std::vector<ui::RowId> _ids;
-    std::vector<std::uint32_t> _indexes; ///< of the rows in the snapshot; empty: all of them
+    std::vector<std::uint32_t> _indexes; ///< of the rows in the snapshot; empty: in its order
 };
 
 } // namespace platform::components

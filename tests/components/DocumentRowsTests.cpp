@@ -55,15 +55,4 @@ TEST(DocumentRows, GivesEveryRowAnIdentifierOfItsOwn)
     EXPECT_EQ(rows->idFor(Url::fileURL("/drive/Notes")), rows->ids()[1]);
 }
 
-TEST(DocumentRows, FindsNamesThatHoldAText)
-{
-    const auto all = snapshot({"Invoice 2023.pdf", "invoices", "notes.txt", "My INVOICE"});
-    const auto found = DocumentRows::matching(all, "InVoice");
-    ASSERT_EQ(found->count(), 3U);
-    EXPECT_EQ(found->entry(2).name, "My INVOICE");
-    EXPECT_EQ(found->url(1).path(), "/drive/invoices");
-    EXPECT_EQ(found->ids()[1], DocumentRows::make(all)->ids()[1]);
-    EXPECT_EQ(DocumentRows::matching(all, "receipt")->count(), 0U);
-}
-
 } // namespace
