@@ -10,6 +10,7 @@
 #include "platform/NotificationCenter.h"
 
 #include <cstdio>
+#include <future>
 #include <map>
 #include <string>
 #include <string_view>
@@ -139,7 +140,8 @@ int main(int argc, char** argv)
     if (arguments.size() == 2 && arguments[1] == "list")
         urls.push_back(Url::fileURL(top));
     const bool resolves = arguments.size() == 3 && arguments[1] == "resolve";
-    const int status = resolves ? printLocation(arguments[2])
+    // The main thread would look only as long as nobody notices.
+    const int status = resolves ? std::async(std::launch::async, printLocation, arguments[2]).get()
         : arguments.size() > 1  ? run(arguments[1], urls)
                                 : 2;
     if (status == 2)
