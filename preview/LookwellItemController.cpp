@@ -4,6 +4,8 @@
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"
+#include "platform/components/DocumentInteractionSheet.h"
+#include "platform/ui/View.h"
 #include "preview/PreviewItemManager.h"
 #include "preview/TarrowDriveAppPreview.h"
 
@@ -31,6 +33,10 @@ std::shared_ptr<LookwellItemController> LookwellItemController::init()
     self.setDataSource(std::shared_ptr<PreviewControllerDataSource>(controller, &self));
     self.setDelegate(std::shared_ptr<PreviewControllerDelegate>(controller, &self));
     self.addButtons();
+    self.setOpenInHandler([weak = std::weak_ptr(controller)](const Url& item, const auto& from) {
+        if (const auto screen = weak.lock())
+            screen->showOtherApps(item, from);
+    });
     return controller;
 }
 
@@ -55,6 +61,16 @@ void LookwellItemController::viewWillDisappear(bool animated)
     if (const auto manager = itemManager())
         manager->viewControllerWillDisappear(*this);
     PreviewController::viewWillDisappear(animated);
+}
+
+void LookwellItemController::showOtherApps(const Url& item, const std::shared_ptr<platform::ui::View>& from)
+{
+    using platform::components::DocumentInteractionSheet;
+    const auto sheet = DocumentInteractionSheet::interactionControllerWithURL(item);
+    if (const auto manager = itemManager())
+        manager->setDocumentInteractionController(sheet);
+    sheet->presentOptionsMenuFromRectInView(
+        shared_from_this(), from ? from->bounds() : platform::Rect(), from, true);
 }
 
 void LookwellItemController::showMoveTarget(const Button&)

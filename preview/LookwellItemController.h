@@ -47,6 +47,8 @@ public:
 
 private:
     void addButtons();
+    /// What else can be done with a document that has no preview.
+    void showOtherApps(const platform::Url& item, const std::shared_ptr<platform::ui::View>& from);
     std::size_t numberOfPreviewItemsInPreviewController(
         const platform::components::PreviewController& controller) const override;
     platform::Url previewControllerPreviewItemAtIndex(
