@@ -174,35 +174,31 @@ void DocumentRowSource::visibleRowsDidChange()
     const auto list = _list.lock();
     if (!list || !_rows)
         return;
+    _loader->setWanted(visibleRowsThat([](const Known* known) { return !known || known->isStale; }));
+    forgetDetailsOutside(list->visibleRows());
+    fetchThumbnails();
+}
+
+std::vector<RowRequest> DocumentRowSource::visibleRowsThat(
+    const std::function<bool(const Known* known)>& lackSomething) const
+{
     std::vector<RowRequest> requests;
-    const auto range = list->visibleRows();
+    const auto list = _list.lock();
+    const auto range = list && _rows ? list->visibleRows() : ui::RowRange();
     for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {
         const auto id = _rows->ids()[row];
         const auto known = _known.find(id);
-        if (known == _known.end() || known->second.isStale)
+        if (lackSomething(known == _known.end() ? nullptr : &known->second))
             requests.push_back({id, _rows->url(row), _rows->entry(row).kind});
     }
-    _loader->setWanted(requests);
-    forgetDetailsOutside(range);
-    fetchThumbnails();
+    return requests;
 }
 
 void DocumentRowSource::fetchThumbnails()
 {
-    const auto list = _list.lock();
-    if (!list || !_rows)
-        return;
-    std::vector<RowRequest> requests;
-    const auto range = list->visibleRows();
-    for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {
-        const auto id = _rows->ids()[row];
-        const auto known = _known.find(id);
-        const bool isMissing = known != _known.end() && known->second.details.modified
-            && known->second.details.modified != known->second.thumbnailOf;
-        if (isMissing)
-            requests.push_back({id, _rows->url(row), _rows->entry(row).kind});
-    }
-    _thumbnails->setWanted(requests);
+    _thumbnails->setWanted(visibleRowsThat([](const Known* known) {
+        return known && known->details.modified && known->details.modified != known->thumbnailOf;
+    }));
 }
 
 void DocumentRowSource::thumbnailArrived(ui::RowId id, std::optional<Image> thumbnail)

@@ -65,6 +65,9 @@ private:
 
     void detailsArrived(ui::RowId id, RowDetails details);
     void thumbnailArrived(ui::RowId id, std::optional<Image> thumbnail);
+    /// Asked with what is known of a row; null: nothing.
+    std::vector<RowRequest> visibleRowsThat(
+        const std::function<bool(const Known* known)>& lackSomething) const;
     void fetchThumbnails();
     void tellIfVisible(ui::RowId id) const;
     void forgetDetailsOutside(const ui::RowRange& range);
