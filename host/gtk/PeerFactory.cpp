@@ -6,7 +6,6 @@
 #include "host/gtk/ListViewPeer.h"
 #include "host/gtk/ScrollViewPeer.h"
 #include "host/gtk/TextFieldPeer.h"
-#include "host/gtk/TextViewPeer.h"
 #include "host/gtk/ViewPeer.h"
 #include "platform/ui/ActivityIndicator.h"
 #include "platform/ui/Button.h"
@@ -14,7 +13,6 @@
 #include "platform/ui/ImageView.h"
 #include "platform/ui/ListView.h"
 #include "platform/ui/TextField.h"
-#include "platform/ui/TextView.h"
 #include "platform/ui/ViewVisitor.h"
 
 namespace host::gtk {
@@ -35,7 +33,6 @@ public:
     void visit(ui::ImageView& view) override { make<ImageViewPeer>(view); }
     void visit(ui::Button& view) override { make<ButtonPeer>(view); }
     void visit(ui::TextField& view) override { make<TextFieldPeer>(view); }
-    void visit(ui::TextView& view) override { make<TextViewPeer>(view); }
     void visit(ui::ScrollView& view) override { make<ScrollViewPeer>(view); }
     void visit(ui::ListView& view) override { make<ListViewPeer>(view); }
     void visit(ui::ActivityIndicator& view) override { make<ActivityIndicatorPeer>(view); }

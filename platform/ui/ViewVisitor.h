@@ -10,7 +10,6 @@ class Label;
 class ListView;
 class ScrollView;
 class TextField;
-class TextView;
 class View;
 
 /// Tells the kinds of view apart without casts: `view.accept(visitor)` calls the operation of the nearest
@@ -24,7 +23,6 @@ public:
     virtual void visit(ImageView& imageView) = 0;
     virtual void visit(Button& button) = 0;
     virtual void visit(TextField& textField) = 0;
-    virtual void visit(TextView& textView) = 0;
     virtual void visit(ScrollView& scrollView) = 0;
     virtual void visit(ListView& listView) = 0;
     virtual void visit(ActivityIndicator& indicator) = 0;
