@@ -5,8 +5,10 @@
 
 #include <cstdint>
 #include <functional>
+#include <memory>
 #include <optional>
 #include <string>
+#include <string_view>
 
 namespace platform {
 
@@ -27,6 +29,12 @@ struct ItemVersion {
     std::uint64_t size = 0; ///< bytes
     std::int64_t modified = 0, changed = 0; ///< nanoseconds since 1970: of the content, of anything
     bool operator==(const ItemVersion&) const = default;
+};
+
+/// A document's bytes, and which state of it they were read in or written as.
+struct FileContent {
+    std::shared_ptr<const std::string> bytes;
+    ItemVersion version;
 };
 
 /// The file system, without coordination. Questions know nothing of promises; changes take a promise for the
@@ -67,6 +75,20 @@ public:
     /// Moves an item to a location, its new name included. Nothing is ever replaced
     /// (FileErrorCode::ItemExists), and the item is whole under one of its names at every moment.
     virtual std::optional<Error> moveItem(const std::string& from, const std::string& to) = 0;
+
+    /// All of a document, to be replaced later, as it was at one moment. Errors: EFBIG beyond
+    /// `maximumBytes`, EACCES or EROFS when the document or its folder must not be written,
+    /// FileErrorCode::NoSuchItem for none and for one that is only promised.
+    virtual Result<FileContent> contentToReplace(const std::string& path, std::size_t maximumBytes) const = 0;
+    /// Puts another content in a document's place: it lies whole on the disk before the name is given to it,
+    /// and takes over identifier, tags and access. One that holds something else than `before` by now is kept
+    /// (FileErrorCode::Cancelled). Answers the new content's version.
+    virtual Result<ItemVersion> replaceContent(
+        const std::string& path, const FileContent& before, std::string_view content) = 0;
+    /// Makes a document with the tags and the access of another one beside it, as far as that is there.
+    /// Nothing is ever replaced (FileErrorCode::ItemExists).
+    virtual std::optional<Error> addDocument(
+        const std::string& path, const std::string& like, std::string_view content) = 0;
 };
 
 } // namespace platform

@@ -33,6 +33,28 @@ std::optional<Error> IndexedItemChanges::moveItem(const std::string& from, const
     return error;
 }
 
+platform::Result<platform::FileContent> IndexedItemChanges::contentToReplace(
+    const std::string& path, std::size_t maximumBytes) const
+{
+    return _changes.contentToReplace(path, maximumBytes);
+}
+
+platform::Result<ItemVersion> IndexedItemChanges::replaceContent(
+    const std::string& path, const platform::FileContent& before, std::string_view content)
+{
+    auto replaced = _changes.replaceContent(path, before, content);
+    // Another file carries the identifier now.
+    if (replaced)
+        _identifiers->moved(path, path);
+    return replaced;
+}
+
+std::optional<Error> IndexedItemChanges::addDocument(
+    const std::string& path, const std::string& like, std::string_view content)
+{
+    return _changes.addDocument(path, like, content);
+}
+
 std::optional<Error> IndexedItemChanges::evictItem(const std::string& path)
 {
     auto error = _changes.evictItem(path);

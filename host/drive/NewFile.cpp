@@ -64,4 +64,63 @@ int NewFile::publish(const DriveEntry& entry, const std::string& name)
     return failure;
 }
 
+/// What lies under this name after a kill is kept: it may be what another program has saved.
+int NewFile::takeHeldName(const DriveLayout& layout, const DriveEntry& entry)
+{
+    auto held = uniqueName(WorkRecord::heldPrefix);
+    const auto folder = entry.path.substr(0, entry.path.rfind('/') + 1);
+    std::optional<WorkRecord> record;
+    int failure = WorkRecord::write(layout, {entry.path, folder + held, {}}, record);
+    if (failure == 0)
+        failure = renameEntry(_folder, _name, _folder, held);
+    if (failure != 0)
+        return failure;
+    _name = std::move(held);
+    _record.emplace(std::move(*record));
+    return 0;
+}
+
+int NewFile::exchange(const DriveEntry& entry) const
+{
+    const int done =
+        ::renameat2(_folder.get(), _name.c_str(), entry.folder.get(), entry.name.c_str(), RENAME_EXCHANGE);
+    return done == 0 ? 0 : errno;
+}
+
+bool NewFile::isUnderPrivateName() const
+{
+    struct stat own, found;
+    return ::fstat(_file.get(), &own) == 0
+        && ::fstatat(_folder.get(), _name.c_str(), &found, AT_SYMLINK_NOFOLLOW) == 0
+        && own.st_dev == found.st_dev && own.st_ino == found.st_ino;
+}
+
+int NewFile::replace(
+    const DriveLayout& layout, const DriveEntry& entry, const platform::ItemVersion& expected)
+{
+    if (::fsync(_file.get()) != 0)
+        return errno;
+    int failure = takeHeldName(layout, entry);
+    if (failure == 0)
+        failure = exchange(entry);
+    if (failure != 0)
+        return failure;
+    // Only what was taken out can be looked at without somebody replacing it meanwhile.
+    struct stat found;
+    if (::fstatat(_folder.get(), _name.c_str(), &found, AT_SYMLINK_NOFOLLOW) != 0)
+        failure = errno;
+    else if (!isSameContent(versionOf(found), expected))
+        failure = ECANCELED;
+    else
+        failure = syncFolder(entry.folder);
+    if (failure != 0 && (exchange(entry) != 0 || !isUnderPrivateName())) {
+        _record->keep();
+        _name.clear();
+        return failure;
+    }
+    ::unlinkat(_folder.get(), _name.c_str(), 0);
+    _name.clear();
+    return failure;
+}
+
 } // namespace host::drive

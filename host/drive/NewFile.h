@@ -25,9 +25,16 @@ public:
     /// Syncs the file and gives it its name; nothing is replaced (EEXIST). Answers 0 or the errno. The record
     /// for the next start stays until the end.
     int publish(const DriveEntry& entry, const std::string& name);
+    /// Syncs the file and gives it the name of one that is `expected`, which goes for good. Answers 0,
+    /// ECANCELED when another version lies there by now, or the errno; nothing has changed then. After a kill
+    /// in between, both are there: one of them in the trash.
+    int replace(const DriveLayout& layout, const DriveEntry& entry, const platform::ItemVersion& expected);
 
 private:
     NewFile() = default;
+    int takeHeldName(const DriveLayout& layout, const DriveEntry& entry);
+    int exchange(const DriveEntry& entry) const;
+    bool isUnderPrivateName() const;
 
     std::optional<WorkRecord> _record;
     system::FileDescriptor _folder, _file;

@@ -36,24 +36,6 @@ int readAttribute(const FileDescriptor& file, const char* name, std::string& val
     return 0;
 }
 
-int copyAttributes(const FileDescriptor& from, const FileDescriptor& to)
-{
-    std::string names(64 * 1024, '\0'), value;
-    const auto length = ::flistxattr(from.get(), names.data(), names.size());
-    if (length < 0)
-        return errno == EOPNOTSUPP ? 0 : errno;
-    for (const char* name = names.data(); name < names.data() + length;
-         name += std::char_traits<char>::length(name) + 1) {
-        if (!std::string_view(name).starts_with("user."))
-            continue;
-        if (const int failure = readAttribute(from, name, value); failure != 0)
-            return failure;
-        if (::fsetxattr(to.get(), name, value.data(), value.size(), 0) != 0)
-            return errno;
-    }
-    return 0;
-}
-
 /// Attributes, access and dates, and then to the disk: the last steps of a copy.
 int finish(const FileDescriptor& from, const FileDescriptor& to, const struct stat& status)
 {
@@ -206,6 +188,24 @@ bool isSameItem(const Pair& pair, int level)
 }
 
 } // namespace
+
+int copyAttributes(const FileDescriptor& from, const FileDescriptor& to, std::string_view except)
+{
+    std::string names(64 * 1024, '\0'), value;
+    const auto length = ::flistxattr(from.get(), names.data(), names.size());
+    if (length < 0)
+        return errno == EOPNOTSUPP ? 0 : errno;
+    for (const char* name = names.data(); name < names.data() + length;
+         name += std::char_traits<char>::length(name) + 1) {
+        if (!std::string_view(name).starts_with("user.") || name == except)
+            continue;
+        if (const int failure = readAttribute(from, name, value); failure != 0)
+            return failure;
+        if (::fsetxattr(to.get(), name, value.data(), value.size(), 0) != 0)
+            return errno;
+    }
+    return 0;
+}
 
 int copyBytes(
     const FileDescriptor& from, const FileDescriptor& to, const std::function<int(std::uint64_t)>& copied)

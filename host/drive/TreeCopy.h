@@ -5,6 +5,7 @@
 #include <cstdint>
 #include <functional>
 #include <string>
+#include <string_view>
 
 namespace host::drive {
 
@@ -14,6 +15,10 @@ namespace host::drive {
 /// mounted in a folder.
 int copyTree(const system::FileDescriptor& folder, const std::string& name,
     const system::FileDescriptor& target, const std::string& newName);
+
+/// Copies the user attributes of a file, but for one of this name; answers 0 or the errno.
+int copyAttributes(
+    const system::FileDescriptor& from, const system::FileDescriptor& to, std::string_view except = {});
 
 /// Whether two items, folders with everything in them, hold the same names, contents and links. Attributes
 /// and dates are not compared; what cannot be read is not the same.

@@ -17,6 +17,12 @@ public:
     virtual std::optional<platform::Error> removeItem(
         const std::string& path, const std::optional<platform::ItemVersion>& unchangedSince) = 0;
     virtual std::optional<platform::Error> moveItem(const std::string& from, const std::string& to) = 0;
+    virtual platform::Result<platform::FileContent> contentToReplace(
+        const std::string& path, std::size_t maximumBytes) const = 0;
+    virtual platform::Result<platform::ItemVersion> replaceContent(
+        const std::string& path, const platform::FileContent& before, std::string_view content) = 0;
+    virtual std::optional<platform::Error> addDocument(
+        const std::string& path, const std::string& like, std::string_view content) = 0;
 };
 
 } // namespace host::system

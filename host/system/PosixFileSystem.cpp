@@ -135,4 +135,26 @@ std::optional<platform::Error> PosixFileSystem::moveItem(const std::string& from
     return _changes ? _changes->moveItem(from, to) : systemError(EROFS, from, to);
 }
 
+platform::Result<platform::FileContent> PosixFileSystem::contentToReplace(
+    const std::string& path, std::size_t maximumBytes) const
+{
+    if (!_changes)
+        return systemError(EROFS, path);
+    return _changes->contentToReplace(path, maximumBytes);
+}
+
+platform::Result<platform::ItemVersion> PosixFileSystem::replaceContent(
+    const std::string& path, const platform::FileContent& before, std::string_view content)
+{
+    if (!_changes)
+        return systemError(EROFS, path);
+    return _changes->replaceContent(path, before, content);
+}
+
+std::optional<platform::Error> PosixFileSystem::addDocument(
+    const std::string& path, const std::string& like, std::string_view content)
+{
+    return _changes ? _changes->addDocument(path, like, content) : systemError(EROFS, path);
+}
+
 } // namespace host::system

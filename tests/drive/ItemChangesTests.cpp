@@ -1,4 +1,5 @@
 #include "host/drive/HeldItem.h"
+#include "host/drive/ItemFacts.h"
 #include "host/drive/LocalCloudStore.h"
 #include "host/drive/LocalItemChanges.h"
 #include "host/drive/Recovery.h"
@@ -11,6 +12,7 @@
 #include <sys/mount.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
+#include <sys/xattr.h>
 
 #include <cerrno>
 #include <filesystem>
@@ -50,6 +52,12 @@ protected:
         const auto entry = DriveEntry::open(layout(), item.path());
         EXPECT_EQ(HeldItem::take(layout(), *entry, entry->name, held), 0);
         return held;
+    }
+    static std::string markOf(const std::string& path, const char* name)
+    {
+        char value[64];
+        const auto length = ::getxattr(path.c_str(), name, value, sizeof value);
+        return length < 0 ? std::string() : std::string(value, static_cast<std::size_t>(length));
     }
     std::size_t heldCount() const
     {
@@ -186,6 +194,81 @@ TEST_F(ItemChangesTest, MovesToAnotherFileSystemAndBack)
             || changes().removeItem(target.path(), std::nullopt))
             return 7;
         return fs::is_empty(small.path()) && !hasTemporary(layout().defaultContainer()) ? 0 : 8;
+    });
+    if (!result)
+        GTEST_SKIP() << "nothing can be mounted here";
+    EXPECT_EQ(result, 0);
+}
+
+TEST_F(ItemChangesTest, ReplacesAContentAndKeepsWhatBelongsToTheDocument)
+{
+    const auto item = writeDocument("plan.pdf", "old");
+    mark(item, host::drive::itemMark::tags, "Work,Urgent");
+    mark(item, host::drive::itemMark::documentIdentifier, "77");
+    ::chmod(item.path().c_str(), 0640);
+    const auto before = changes().contentToReplace(item.path(), 100);
+    ASSERT_TRUE(before);
+    EXPECT_EQ(*before->bytes, "old");
+    // Another tag and another copy of the same bytes are no other content.
+    mark(item, host::drive::itemMark::tags, "Work");
+    const auto after = changes().replaceContent(item.path(), *before, "new and longer");
+    ASSERT_TRUE(after);
+    EXPECT_EQ(contentOf(item.path()), "new and longer");
+    EXPECT_EQ(changes().versionOfItem(item.path()), *after.value);
+    EXPECT_EQ(markOf(item.path(), host::drive::itemMark::tags), "Work");
+    EXPECT_EQ(markOf(item.path(), host::drive::itemMark::documentIdentifier), "77");
+    EXPECT_EQ(fs::status(item.path()).permissions(), fs::perms(0640));
+
+    const auto copy = url("plan 2.pdf");
+    EXPECT_FALSE(changes().addDocument(copy.path(), item.path(), "copy"));
+    EXPECT_EQ(contentOf(copy.path()), "copy");
+    EXPECT_EQ(markOf(copy.path(), host::drive::itemMark::tags), "Work");
+    EXPECT_EQ(markOf(copy.path(), host::drive::itemMark::documentIdentifier), "");
+    const auto taken = changes().addDocument(copy.path(), item.path(), "other");
+    EXPECT_TRUE(taken && taken->is(FileErrorCode::ItemExists));
+    EXPECT_EQ(contentOf(copy.path()), "copy");
+    EXPECT_FALSE(hasTemporary(layout().defaultContainer()));
+    EXPECT_EQ(heldCount(), 0U);
+}
+
+TEST_F(ItemChangesTest, RefusesToReplaceWhatIsNotTheContentThatWasRead)
+{
+    const auto item = writeDocument("plan.pdf", "old");
+    const auto before = changes().contentToReplace(item.path(), 100);
+    ASSERT_TRUE(before);
+    const auto refusal = [&] { return changes().replaceContent(item.path(), *before, "ours").error; };
+    writeDocument("plan.pdf", "its");
+    EXPECT_TRUE(refusal()->is(FileErrorCode::Cancelled)) << "of the same length";
+    EXPECT_EQ(contentOf(item.path()), "its");
+    fs::remove(item.path());
+    EXPECT_TRUE(refusal()->is(FileErrorCode::NoSuchItem));
+    EXPECT_FALSE(fs::exists(item.path()));
+    writeLink("plan.pdf", folder().write("outside.pdf", "old"));
+    EXPECT_TRUE(refusal());
+    EXPECT_EQ(contentOf(folder().at("outside.pdf")), "old");
+    fs::remove(item.path());
+    writeDocument("plan.pdf", "old");
+    EXPECT_FALSE(refusal()) << "the very same content came back";
+
+    EXPECT_EQ(changes().contentToReplace(item.path(), 3).error->code(), EFBIG);
+    ::chmod(item.path().c_str(), 0444);
+    EXPECT_EQ(changes().contentToReplace(item.path(), 100).error->code(), EACCES);
+    EXPECT_FALSE(hasTemporary(layout().defaultContainer()));
+    EXPECT_EQ(heldCount(), 0U);
+}
+
+TEST_F(ItemChangesTest, AFullDiskKeepsTheContentThatIsThere)
+{
+    const auto small = makeFolder("small"), item = small.appendingPathComponent("plan.pdf");
+    const auto result = withMounts([&] {
+        if (::mount("tmpfs", small.path().c_str(), "tmpfs", 0, "size=64k") != 0)
+            return 99;
+        std::ofstream(item.path()) << "old";
+        const auto before = changes().contentToReplace(item.path(), 100);
+        const auto refused = changes().replaceContent(item.path(), *before, std::string(100'000, 'x'));
+        if (!refused.error || refused.error->code() != ENOSPC || contentOf(item.path()) != "old")
+            return 1;
+        return hasTemporary(small.path()) || heldCount() != 0 ? 2 : 0;
     });
     if (!result)
         GTEST_SKIP() << "nothing can be mounted here";

@@ -134,6 +134,39 @@ TEST_F(RaceTest, NoVersionIsDeletedThatTheDeleterHadNotSeen)
     EXPECT_GT(saver.saved, rounds / 2);
 }
 
+TEST_F(RaceTest, NoVersionIsReplacedThatWasNotRead)
+{
+    constexpr int rounds = 300;
+    const auto item = url("a.txt");
+    Saver saver(item.path(), folder().at("temporary"));
+    saver.save();
+    std::atomic<bool> isOver = false;
+    std::thread saving([&] {
+        while (!isOver)
+            saver.save();
+    });
+    std::set<int> accounted;
+    int replaced = 0;
+    for (int round = 0; round < rounds; ++round) {
+        const auto before = changes.contentToReplace(item.path(), 100);
+        if (before && changes.replaceContent(item.path(), *before, "0")) {
+            accounted.insert(std::atoi(before->bytes->c_str()));
+            ++replaced;
+        }
+    }
+    isOver = true;
+    saving.join();
+    accounted.merge(saver.accounted);
+    host::drive::Recovery(layout(), *store).run();
+    for (const auto& entry : fs::recursive_directory_iterator(layout().home())) {
+        if (entry.is_regular_file())
+            accounted.insert(std::atoi(read(entry.path().string()).c_str()));
+    }
+    for (int version = 1; version <= saver.saved; ++version)
+        EXPECT_TRUE(accounted.contains(version)) << version << " of " << saver.saved << " is lost";
+    EXPECT_GT(replaced, 0);
+}
+
 TEST_F(RaceTest, AFolderSwappedForALinkNeverLeadsOutside)
 {
     constexpr int rounds = 600;
