@@ -194,7 +194,6 @@ GtkWidget* showPart(TrwListRow* row, Part part, bool wanted)
 void trw_list_row_init(TrwListRow* row)
 {
     row->shown = new ui::ListRow();
-    showPart(row, Texts, true);
 }
 
 void showTexts(TrwListRow* row, const ui::ListRow& content)
@@ -273,12 +272,18 @@ bool isRow(GtkWidget* widget)
     return G_TYPE_CHECK_INSTANCE_TYPE(widget, trw_list_row_get_type());
 }
 
+void reserve(GtkWidget* row, double height)
+{
+    gtk_widget_set_size_request(row, -1, static_cast<int>(height));
+}
+
 void show(GtkWidget* widget, const ui::ListRow& content, double height)
 {
     auto* row = rowOf(widget);
-    gtk_widget_set_size_request(widget, -1, static_cast<int>(height));
+    reserve(widget, height);
     if (row->isFilled && *row->shown == content)
         return;
+    showPart(row, Texts, true);
     const bool sameIcon = row->isFilled && row->shown->image == content.image;
     *row->shown = content;
     showTexts(row, content);
@@ -313,7 +318,7 @@ bool isOnMark(GtkWidget* row, double x)
 
 const char* titleText(GtkWidget* row)
 {
-    return gtk_label_get_label(GTK_LABEL(rowOf(row)->title));
+    return rowOf(row)->isFilled ? gtk_label_get_label(GTK_LABEL(rowOf(row)->title)) : "";
 }
 
 } // namespace host::gtk::ListRowWidget

@@ -18,6 +18,8 @@ using Handler = std::function<void(GtkWidget* row, Request request)>;
 
 GtkWidget* make(GtkListItem* item, Handler handler);
 bool isRow(GtkWidget* widget);
+/// Takes the room of a row that is shown later.
+void reserve(GtkWidget* row, double height);
 /// Shows a row; cheap when it is what the widget shows already.
 void show(GtkWidget* row, const platform::ui::ListRow& content, double height);
 const platform::ui::ListRow& shown(GtkWidget* row);

@@ -17,10 +17,11 @@ namespace {
 
 /// The toolkit keeps about this many rows as widgets, whatever the screen shows; more rows cost nothing.
 constexpr std::size_t livingRows = 220;
-/// How many of them are made in one frame, so that a frame stays a frame.
-constexpr std::size_t moreRows = 8;
-/// The first fill the list, whose height is not known before its first layout, but no very tall screen.
-constexpr std::size_t fewestFirstRows = 12, mostFirstRows = 24;
+/// How many of them are made in one frame, and how many are filled, so that a frame stays a frame. The first
+/// frame has a page to lay out as well.
+constexpr std::size_t firstRows = 6, moreRows = 6;
+/// Rows beside the seen ones that are filled with them: a layout that is a little late shows no empty row.
+constexpr std::size_t seenMargin = 2;
 /// The widgets take so many single changes at once; more are told in one away from what is seen.
 constexpr std::size_t mostSplices = 16;
 constexpr double markDragStart = 8; ///< points; a finger that only taps moves less
@@ -48,6 +49,20 @@ std::size_t rowCountBefore(const ui::ListView& list, const ui::ListChanges& chan
     return count;
 }
 
+/// Whether a row that stayed shows something else.
+bool showsAnew(const ui::ListChanges& changes, std::size_t row)
+{
+    const auto after = std::ranges::upper_bound(
+        changes.changed, row, {}, [](const ui::RowRange& range) { return range.first; });
+    return after != changes.changed.begin() && std::prev(after)->contains(row);
+}
+
+bool isSeen(const ui::ListView& list, std::size_t row)
+{
+    const auto visible = list.visibleRows();
+    return row + seenMargin >= visible.first && row < visible.end() + seenMargin;
+}
+
 /// Few enough splices that leave the rows with widgets alone, or at least those that are seen: a row that
 /// goes and comes again has to be filled again.
 std::vector<ui::ListSplice> splicesToTell(const ui::RowRange& visible, const ui::ListChanges& changes)
@@ -73,7 +88,7 @@ ListViewPeer::ListViewPeer(std::shared_ptr<PeerContext> context, const std::shar
 
 ListViewPeer::~ListViewPeer()
 {
-    context().scheduler().cancel(&_refreshKey);
+    context().scheduler().cancel(&_fillKey);
     context().scheduler().cancel(&_growKey);
     context().scheduler().cancel(&_focusKey);
     context().scheduler().cancel(&_scrollKey);
@@ -113,10 +128,12 @@ void ListViewPeer::connectFactory(GtkListItemFactory* factory)
         connectSignal<void(GtkListItem*)>(factory, "setup", [this](GtkListItem* item) { setUpRow(item); }));
     connect(connectSignal<void(GtkListItem*)>(factory, "bind", [this](GtkListItem* item) {
         _live.insert(item);
-        bindRow(item);
+        fillSoon(item);
     }));
-    connect(connectSignal<void(GtkListItem*)>(
-        factory, "unbind", [this](GtkListItem* item) { _live.erase(item); }));
+    connect(connectSignal<void(GtkListItem*)>(factory, "unbind", [this](GtkListItem* item) {
+        _live.erase(item);
+        _unfilled.erase(item);
+    }));
 }
 
 void ListViewPeer::connectInput()
@@ -210,9 +227,69 @@ void ListViewPeer::bindRow(GtkListItem* item)
 {
     const auto list = _list.lock();
     const guint position = gtk_list_item_get_position(item);
-    // Between two splices of one change the widgets may ask for a place that the model has no row for.
+    _unfilled.erase(item);
     if (list && position < list->rowCount())
         ListRowWidget::show(gtk_list_item_get_child(item), list->row(position), list->rowHeight());
+}
+
+void ListViewPeer::fillSoon(GtkListItem* item)
+{
+    const auto list = _list.lock();
+    // Between two splices of one change a place is not that of the row.
+    if (list && !_isSplicing && isSeen(*list, gtk_list_item_get_position(item)))
+        return bindRow(item);
+    if (list)
+        ListRowWidget::reserve(gtk_list_item_get_child(item), list->rowHeight());
+    _unfilled.insert(item);
+    fillLater();
+}
+
+void ListViewPeer::fillAllSoon()
+{
+    _unfilled = _live;
+    fillLater();
+}
+
+void ListViewPeer::fillLater()
+{
+    context().scheduler().schedule(&_fillKey, [this] { fillRows(); });
+}
+
+void ListViewPeer::fillRows()
+{
+    fillSeenRows();
+    auto others = unfilledBesideSeen();
+    const bool areMore = others.size() > moreRows;
+    others.resize(std::min(others.size(), moreRows));
+    for (auto* item : others)
+        bindRow(item);
+    if (areMore)
+        context().scheduler().scheduleNextFrame(&_fillKey, [this] { fillRows(); });
+    if (!_live.empty())
+        noteFirstList(_listWidget);
+}
+
+void ListViewPeer::fillSeenRows()
+{
+    const auto list = _list.lock();
+    const auto waiting = _unfilled;
+    for (auto* item : waiting) {
+        if (list && isSeen(*list, gtk_list_item_get_position(item)))
+            bindRow(item);
+    }
+}
+
+/// The nearest first.
+std::vector<GtkListItem*> ListViewPeer::unfilledBesideSeen() const
+{
+    std::vector<GtkListItem*> items(_unfilled.begin(), _unfilled.end());
+    const auto list = _list.lock();
+    const auto seen = list ? list->visibleRows().first : 0;
+    std::ranges::sort(items, {}, [seen](GtkListItem* item) {
+        const std::size_t position = gtk_list_item_get_position(item);
+        return position < seen ? seen - position : position - seen;
+    });
+    return items;
 }
 
 std::vector<GtkWidget*> ListViewPeer::liveRows() const
@@ -243,6 +320,7 @@ void ListViewPeer::scrolled()
     const double top = list->contentInsets().top;
     auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
     list->userScrolled({0, gtk_adjustment_get_value(adjustment) - top});
+    fillSeenRows();
 }
 
 void ListViewPeer::showMenuOf(GtkWidget* row, double x, double y)
@@ -288,8 +366,7 @@ void ListViewPeer::mirror(ui::View& shown, ui::ViewChanges changes)
     list->setScrollObserver(observing<ui::ScrollObserver>(*this));
     list->setListObserver(observing<ui::ListViewObserver>(*this));
     showRows(list->rowCount());
-    _refreshesAll = true;
-    refreshRows();
+    fillAllSoon();
     refreshStateDidChange(*list);
 }
 
@@ -298,9 +375,6 @@ void ListViewPeer::showRows(std::size_t count)
     const std::size_t known = g_list_model_get_n_items(_rows.get());
     if (known == count)
         return;
-    const auto list = _list.lock();
-    const auto firstRows =
-        std::clamp(list ? list->visibleRows().count + 1 : 0, fewestFirstRows, mostFirstRows);
     // A list that is far enough is complete at once; one that begins grows into its rows.
     const auto next =
         known >= livingRows || count <= firstRows ? count : std::min(count, std::max(known, firstRows));
@@ -329,7 +403,7 @@ void ListViewPeer::rowsWereReset(ui::ListView& list)
     const auto focusedAt = focused ? std::optional(ListRowWidget::position(focused)) : std::nullopt;
     RowModel::reset(_rows.get(), 0);
     showRows(list.rowCount());
-    refreshRowsLater();
+    fillAllSoon();
     if (focusedAt && list.rowCount() > 0)
         focusSoon(std::min<std::size_t>(*focusedAt, list.rowCount() - 1), focusFrames);
 }
@@ -339,45 +413,43 @@ void ListViewPeer::rowsDidChange(ui::ListView& list, const ui::ListChanges& chan
     auto* focused = focusedRow();
     const auto focusedAt = focused ? std::optional(ListRowWidget::position(focused)) : std::nullopt;
     // A list that still grows shows its beginning only: its rows are read anew instead.
-    if (g_list_model_get_n_items(_rows.get()) == rowCountBefore(list, changes)) {
-        for (const auto& splice : splicesToTell(list.visibleRows(), changes))
-            RowModel::splice(_rows.get(), static_cast<guint>(splice.position),
-                static_cast<guint>(splice.removed), static_cast<guint>(splice.inserted));
-    }
+    if (g_list_model_get_n_items(_rows.get()) == rowCountBefore(list, changes))
+        splice(list, changes);
+    else
+        fillAllSoon();
     showRows(list.rowCount());
-    refreshRowsLater();
     // The row that had the keyboard is gone: the one that came to its place has it now.
     if (focusedAt && !focusedRow() && list.rowCount() > 0)
         focusSoon(std::min<std::size_t>(*focusedAt, list.rowCount() - 1), focusFrames);
 }
 
+void ListViewPeer::splice(const ui::ListView& list, const ui::ListChanges& changes)
+{
+    _isSplicing = true;
+    for (const auto& splice : splicesToTell(list.visibleRows(), changes))
+        RowModel::splice(_rows.get(), static_cast<guint>(splice.position), static_cast<guint>(splice.removed),
+            static_cast<guint>(splice.inserted));
+    _isSplicing = false;
+    for (auto* item : _live) {
+        if (showsAnew(changes, gtk_list_item_get_position(item)))
+            _unfilled.insert(item);
+    }
+    if (!_unfilled.empty())
+        fillLater();
+}
+
 void ListViewPeer::rowDidChange(ui::ListView&, std::size_t index)
 {
-    _changedRows.insert(index);
-    context().scheduler().schedule(&_refreshKey, [this] { refreshRows(); });
+    for (auto* item : _live) {
+        if (gtk_list_item_get_position(item) == index)
+            _unfilled.insert(item);
+    }
+    fillLater();
 }
 
 void ListViewPeer::selectionDidChange(ui::ListView&)
 {
-    refreshRowsLater();
-}
-
-void ListViewPeer::refreshRowsLater()
-{
-    _refreshesAll = true;
-    context().scheduler().schedule(&_refreshKey, [this] { refreshRows(); });
-}
-
-void ListViewPeer::refreshRows()
-{
-    const bool all = std::exchange(_refreshesAll, false);
-    const auto changed = std::exchange(_changedRows, {});
-    for (auto* item : _live) {
-        if (all || changed.contains(gtk_list_item_get_position(item)))
-            bindRow(item);
-    }
-    if (!_live.empty())
-        noteFirstList(_listWidget);
+    fillAllSoon();
 }
 
 void ListViewPeer::scrollTo(ui::ScrollView& view, Point offset, bool /*animated*/)

@@ -50,10 +50,16 @@ private:
     /// Lets the widgets know of as many rows as a frame can make widgets for, and of more in the next frames.
     void showRows(std::size_t count);
     void growRows();
+    void splice(const platform::ui::ListView& list, const platform::ui::ListChanges& changes);
     /// Scrolls, at the latest after so many frames.
     void moveTo(double value, int frames);
-    void refreshRowsLater();
-    void refreshRows();
+    /// Rows that are seen are filled at once, those beside them a few in each frame.
+    void fillSoon(GtkListItem* item);
+    void fillAllSoon();
+    void fillLater();
+    void fillRows();
+    void fillSeenRows();
+    std::vector<GtkListItem*> unfilledBesideSeen() const;
     void showMenuOf(GtkWidget* row, double x, double y);
     void showMenuOfList(double x, double y);
     void held(GtkWidget* row, double x, double y);
@@ -73,14 +79,14 @@ private:
     ObjectRef<GListModel> _rows;
     GtkWidget *_listWidget = nullptr, *_window = nullptr, *_refresher = nullptr, *_spinner = nullptr;
     std::unordered_set<GtkListItem*> _live;
-    std::unordered_set<std::size_t> _changedRows; ///< to be shown anew in the next frame
-    bool _refreshesAll = false; ///< all rows are
+    std::unordered_set<GtkListItem*> _unfilled; ///< of those, the ones that do not show their rows yet
+    bool _isSplicing = false; ///< rows are not at their final places
     SignalConnection _onScroll;
     platform::ui::TypeAhead _typeAhead;
     int _focusKey = 0; ///< its address names the focusing of a row in the scheduler
     int _scrollKey = 0; ///< its address names the second step of a scrolling in the scheduler
     int _growKey = 0; ///< its address names the growing of the list in the scheduler
-    int _refreshKey = 0; ///< its address names the refreshing of rows in the scheduler
+    int _fillKey = 0; ///< its address names the filling of rows in the scheduler
 };
 
 } // namespace host::gtk
