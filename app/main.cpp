@@ -4,6 +4,7 @@
 #include "host/gtk/DesktopSharing.h"
 #include "host/gtk/LaunchContext.h"
 #include "host/gtk/MakeApplication.h"
+#include "host/gtk/PreviewModule.h"
 #include "host/system/GLibDispatch.h"
 #include "host/system/GdkPixbufImageLoader.h"
 #include "host/system/GettextLocalization.h"
@@ -16,7 +17,6 @@
 #include "host/system/JsonUserDefaults.h"
 #include "host/system/LocalFileCoordinator.h"
 #include "host/system/MimeTypeRegistry.h"
-#include "host/system/PopplerDocuments.h"
 #include "host/system/PosixFileSystem.h"
 #include "host/system/ThreadedFolderLister.h"
 #include "host/system/TypePreviewSupport.h"
@@ -57,8 +57,19 @@ std::string localeFolder(const std::filesystem::path& executable)
                                                    : executable.parent_path().parent_path() / "share/locale";
 }
 
+/// The module of the previews, in the build tree, else where it is installed.
+std::string previewModule(const std::filesystem::path& executable)
+{
+    const auto built = executable.parent_path() / "modules" / "previews.so";
+    std::error_code problem;
+    return std::filesystem::exists(built, problem)
+        ? built
+        : executable.parent_path().parent_path() / TRW_MODULE_FOLDER / "previews.so";
+}
+
 /// What needs nothing of the drive.
-ServiceSet systemServices(const std::string& executable, const UserLocale& locale)
+ServiceSet systemServices(const std::string& executable, const UserLocale& locale,
+    const std::shared_ptr<host::gtk::PreviewModule>& previews)
 {
     ServiceSet set;
     set.localization = std::make_shared<host::system::GettextLocalization>(localeFolder(executable), locale);
@@ -70,13 +81,13 @@ ServiceSet systemServices(const std::string& executable, const UserLocale& local
     set.typeRegistry = types;
     set.appRegistry = std::make_shared<host::system::GioAppRegistry>(
         types, "app.tarrow.Drive", host::gtk::makeLaunchContext);
-    set.documentSharing = std::make_shared<host::gtk::DesktopSharing>(types);
+    set.documentSharing = std::make_shared<host::gtk::DesktopSharing>(types, previews);
     set.folderLister =
         std::make_shared<host::system::ThreadedFolderLister>(set.dispatch, types, locale.formats);
     set.nameSearch = std::make_shared<host::system::IndexedNameSearch>(set.dispatch, types);
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(types);
     set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
-    set.pagedDocumentOpener = std::make_shared<host::system::PopplerDocuments>();
+    set.pagedDocumentOpener = previews;
     set.linkOpener = std::make_shared<host::system::GioLinkOpener>();
     set.keyedArchiver = std::make_shared<host::system::JsonKeyedArchiver>();
     return set;
@@ -116,15 +127,18 @@ int main(int argc, char** argv)
 
     // Read once: the message catalogues' set-up changes the variables that it comes from.
     const auto locale = UserLocale::fromEnvironment();
-    auto set = systemServices(executable, locale);
+    const auto previews = host::gtk::PreviewModule::inFile(previewModule(executable));
+    auto set = systemServices(executable, locale, previews);
     const auto layout = addDriveServices(set, locale);
     // The queues end last: everything else may still hand them work while it ends.
     const auto dispatch = set.dispatch;
     platform::installServices(std::move(set));
     tarrow::FileUtils::logFileAttributes(executable);
 
-    auto application =
-        host::gtk::makeApplication({.version = TRW_VERSION, .stateFile = layout.interfaceState()});
+    auto application = host::gtk::makeApplication({.version = TRW_VERSION,
+        .stateFile = layout.interfaceState(),
+        .previews = previews,
+        .onFirstList = [previews] { previews->whenLoaded([](const auto&) {}); }});
     const int status = application->run(argc, argv, [] { return std::make_shared<tarrow::AppDelegate>(); });
     application.reset();
     platform::installServices({});

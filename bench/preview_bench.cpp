@@ -8,7 +8,7 @@
 #include "host/system/IcuFormatters.h"
 #include "host/system/LocalFileCoordinator.h"
 #include "host/system/MimeTypeRegistry.h"
-#include "host/system/PopplerDocuments.h"
+#include "host/previews/PopplerDocuments.h"
 #include "host/system/PosixFileSystem.h"
 #include "platform/NotificationCenter.h"
 #include "platform/PagedDocument.h"
@@ -88,7 +88,7 @@ public:
         set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
         set.formatters = std::make_shared<host::system::IcuFormatters>("en_US");
         set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
-        set.pagedDocumentOpener = std::make_shared<host::system::PopplerDocuments>();
+        set.pagedDocumentOpener = std::make_shared<host::previews::PopplerDocuments>();
         set.typeRegistry = std::make_shared<host::system::MimeTypeRegistry>();
         set.cloudDocumentService = host::drive::LocalCloudDocumentService::create(layout,
             {set.dispatch, set.notificationCenter, set.typeRegistry, nullptr, nullptr},

@@ -86,8 +86,10 @@ GtkWindow* activeWindow()
 
 } // namespace
 
-DesktopSharing::DesktopSharing(std::shared_ptr<const platform::TypeRegistry> types)
+DesktopSharing::DesktopSharing(
+    std::shared_ptr<const platform::TypeRegistry> types, std::shared_ptr<const PreviewModule> previews)
     : _types(std::move(types))
+    , _previews(std::move(previews))
 {
 }
 
@@ -171,8 +173,8 @@ void DesktopSharing::print(const Url& document, Completion completion)
     if (!_queue)
         _queue = dispatch.makeOperationQueue("printing", platform::QualityOfService::UserInitiated);
     _queue->addOperation([path = document.path(), name = document.lastPathComponent(), kind = *kind, main,
-                             told = std::move(completion)] {
-        auto pages = readPrintablePages(path, kind);
+                             previews = _previews, told = std::move(completion)] {
+        auto pages = readPrintablePages(path, kind, *previews);
         main->async([pages = std::move(pages), name, told] {
             if (pages)
                 startPrinting(*pages, name, {activeWindow()}, told);

@@ -12,6 +12,7 @@ class TypeRegistry;
 
 namespace host::gtk {
 
+class PreviewModule;
 enum class PrintableKind : int;
 
 /// The desktop's ways to hand on a document: its clipboard, the mail program of "mailto" through xdg-email,
@@ -19,7 +20,8 @@ enum class PrintableKind : int;
 /// print dialog.
 class DesktopSharing : public platform::DocumentSharing {
 public:
-    explicit DesktopSharing(std::shared_ptr<const platform::TypeRegistry> types);
+    DesktopSharing(
+        std::shared_ptr<const platform::TypeRegistry> types, std::shared_ptr<const PreviewModule> previews);
 
     void copyText(const std::string& text) override;
     bool canSendByMail() const override;
@@ -32,6 +34,7 @@ private:
     std::optional<PrintableKind> printableKind(const platform::Url& document) const;
 
     std::shared_ptr<const platform::TypeRegistry> _types;
+    std::shared_ptr<const PreviewModule> _previews;
     std::shared_ptr<platform::OperationQueue> _queue; ///< made at the first printing
 };
 

@@ -2,28 +2,41 @@
 
 #include "platform/Log.h"
 
+#include <utility>
+
 namespace host::gtk {
 
-namespace {
-
-void painted(GdkFrameClock* clock, gpointer data)
+FirstList::~FirstList()
 {
-    static constexpr platform::Operation op{"noteFirstList"};
-    g_signal_handlers_disconnect_by_data(clock, data);
-    op.info("First list on screen");
+    if (_idle != 0)
+        g_source_remove(_idle);
 }
 
-} // namespace
-
-void noteFirstList(GtkWidget* list)
+void FirstList::note(GtkWidget* list)
 {
-    static bool noted = false;
     auto* clock = gtk_widget_get_frame_clock(list);
-    if (noted || !clock)
+    if (_isNoted || !clock)
         return;
-    noted = true;
-    g_signal_connect(clock, "after-paint", G_CALLBACK(painted), &noted);
+    _isNoted = true;
+    _onPaint = connectSignal<void()>(clock, "after-paint", [this] { painted(); });
     gtk_widget_queue_draw(list);
+}
+
+void FirstList::painted()
+{
+    static constexpr platform::Operation op{"FirstList::painted"};
+    op.info("First list on screen");
+    const auto call = [](gpointer data) -> gboolean {
+        auto* self = static_cast<FirstList*>(data);
+        self->_idle = 0;
+        self->_onPaint.disconnect();
+        if (const auto shown = std::exchange(self->_onShown, {}))
+            shown();
+        return G_SOURCE_REMOVE;
+    };
+    if (_idle == 0)
+        _idle = g_idle_add_full(G_PRIORITY_LOW, call, this, nullptr);
+    _onPaint.block();
 }
 
 } // namespace host::gtk

@@ -274,7 +274,7 @@ void GtkApplicationLoop::launch(std::optional<ShortcutItem> shortcut)
     auto size = storedSize(_stateFile);
     // A browser's page is the whole screen of its window.
     size.isMaximized = size.isMaximized || _broadway;
-    _windowHost = std::make_shared<GtkWindowHost>(_application.get(), size);
+    _windowHost = std::make_shared<GtkWindowHost>(_application.get(), size, _settings.previews);
     _windowHost->setOnShow([this](WindowPeer& window) { windowShown(window); });
     platform::ui::WindowHost::install(_windowHost);
     _delegate = _makeDelegate();
@@ -291,6 +291,7 @@ void GtkApplicationLoop::launch(std::optional<ShortcutItem> shortcut)
 
 void GtkApplicationLoop::windowShown(WindowPeer& window)
 {
+    window.context()->firstList().setOnShown(_settings.onFirstList);
     window.setOnActive([this](bool active) { activeChanged(active); });
     window.setOnClosed([this] { resignActive(); });
     _handOver = HandOverToasts::make(

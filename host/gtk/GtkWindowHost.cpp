@@ -2,9 +2,11 @@
 
 namespace host::gtk {
 
-GtkWindowHost::GtkWindowHost(AdwApplication* application, const WindowSize& size)
+GtkWindowHost::GtkWindowHost(
+    AdwApplication* application, const WindowSize& size, std::shared_ptr<PreviewModule> previews)
     : _application(application)
     , _size(size)
+    , _previews(std::move(previews))
 {
 }
 
@@ -14,7 +16,7 @@ void GtkWindowHost::showWindow(const std::shared_ptr<platform::ui::Window>& wind
         _peer->show();
         return;
     }
-    _peer = WindowPeer::make(_application, window, _size);
+    _peer = WindowPeer::make(_application, window, _size, _previews);
     if (_onShow)
         _onShow(*_peer);
     _peer->show();

@@ -12,7 +12,8 @@ namespace host::gtk {
 class GtkWindowHost : public platform::ui::WindowHost {
 public:
     /// `application` may be null: windows then stand for themselves.
-    explicit GtkWindowHost(AdwApplication* application, const WindowSize& size = {});
+    GtkWindowHost(
+        AdwApplication* application, const WindowSize& size, std::shared_ptr<PreviewModule> previews);
 
     void showWindow(const std::shared_ptr<platform::ui::Window>& window) override;
     /// The window that is shown; null: none.
@@ -25,6 +26,7 @@ public:
 private:
     AdwApplication* _application;
     WindowSize _size;
+    std::shared_ptr<PreviewModule> _previews;
     std::shared_ptr<WindowPeer> _peer;
     std::function<void(WindowPeer&)> _onShow;
 };

@@ -1,6 +1,5 @@
 #include "host/gtk/ListViewPeer.h"
 
-#include "host/gtk/FirstList.h"
 #include "host/gtk/ListRowWidget.h"
 #include "host/gtk/MenuPopover.h"
 #include "host/gtk/RowModel.h"
@@ -266,7 +265,7 @@ void ListViewPeer::fillRows()
     if (areMore)
         context().scheduler().scheduleNextFrame(&_fillKey, [this] { fillRows(); });
     if (!_live.empty())
-        noteFirstList(_listWidget);
+        context().firstList().note(_listWidget);
 }
 
 void ListViewPeer::fillSeenRows()

@@ -2,15 +2,21 @@
 
 #include "platform/Application.h"
 
+#include <functional>
 #include <memory>
 #include <string>
 
 namespace host::gtk {
 
+class PreviewModule;
+
 struct ApplicationSettings {
     std::string applicationId = "app.tarrow.Drive";
     std::string version;
     std::string stateFile; ///< path of the file that keeps the interface's state
+    std::shared_ptr<PreviewModule> previews;
+    /// Called once, when the first list is on the screen and nothing else is to be done: for what can wait.
+    std::function<void()> onFirstList;
 };
 
 /// The application's loop on GTK (see GtkApplicationLoop), behind the platform's interface.

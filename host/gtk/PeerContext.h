@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/gtk/FirstList.h"
 #include "host/gtk/FrameScheduler.h"
 #include "host/gtk/ObjectRef.h"
 #include "host/gtk/Theme.h"
@@ -34,6 +35,7 @@ public:
 
     Theme& theme() const { return *_theme; }
     FrameScheduler& scheduler() const { return *_scheduler; }
+    FirstList& firstList() { return _firstList; }
 
     void add(const platform::ui::View& view, ViewPeer& peer);
     void remove(const platform::ui::View& view, const ViewPeer& peer);
@@ -54,6 +56,7 @@ public:
 private:
     std::shared_ptr<Theme> _theme;
     std::shared_ptr<FrameScheduler> _scheduler;
+    FirstList _firstList;
     std::unordered_map<const platform::ui::View*, ViewPeer*> _peers;
     std::unordered_map<const platform::ui::BarButtonItem*, GtkWidget*> _itemWidgets;
     std::map<std::string, HostedViewMaker> _makers;

@@ -1,9 +1,10 @@
 #include "host/gtk/PreviewNative.h"
 
-#include "host/gtk/MediaNative.h"
 #include "host/gtk/PagesNative.h"
 #include "host/gtk/PictureNative.h"
-#include "host/gtk/TextNative.h"
+#include "host/gtk/PreviewModule.h"
+#include "platform/components/PreviewMediaView.h"
+#include "platform/components/PreviewTextView.h"
 
 #include <adwaita.h>
 
@@ -19,30 +20,54 @@ namespace {
 
 constexpr const char* nativeKey = "trw-preview-native";
 
-/// The native view lives in a holder of its own: it keeps its widgets, the holder keeps it.
-ObjectRef<GtkWidget> hold(std::shared_ptr<PreviewNative> native)
+using Native = std::shared_ptr<PreviewNative>;
+
+void show(GtkWidget* holder, PreviewView& view, const Native& native)
 {
-    auto holder = ObjectRef<GtkWidget>::retain(adw_bin_new());
-    adw_bin_set_child(ADW_BIN(holder.get()), native->widget());
-    g_object_set_data_full(G_OBJECT(holder.get()), nativeKey,
-        std::make_unique<std::shared_ptr<PreviewNative>>(std::move(native)).release(),
-        [](gpointer held) { delete static_cast<std::shared_ptr<PreviewNative>*>(held); });
-    return holder;
+    native->start();
+    view.setPreviewObserver(native);
+    adw_bin_set_child(ADW_BIN(holder), native->widget());
+    // The native view keeps its widgets, their holder keeps it.
+    g_object_set_data_full(G_OBJECT(holder), nativeKey, std::make_unique<Native>(native).release(),
+        [](gpointer held) { delete static_cast<Native*>(held); });
 }
 
-template <typename View, typename Native>
-void addMaker(PeerContext& context)
+/// `fill` puts the native view of a new view into its holder, now or later.
+template <typename View, typename Fill>
+void addMaker(PeerContext& context, Fill fill)
 {
     context.setHostedViewMaker(
-        View::kindName, [](ui::HostedView& hosted, GtkWidget* current) -> ObjectRef<GtkWidget> {
+        View::kindName, [fill](ui::HostedView& hosted, GtkWidget* current) -> ObjectRef<GtkWidget> {
             if (current)
                 return ObjectRef<GtkWidget>::retain(current);
+            auto holder = ObjectRef<GtkWidget>::retain(adw_bin_new());
             // The kind says what the view is.
-            const auto view = std::static_pointer_cast<View>(hosted.shared_from_this());
-            const auto native = std::make_shared<Native>(view);
-            native->start();
-            view->setPreviewObserver(native);
-            return hold(native);
+            fill(holder, std::static_pointer_cast<View>(hosted.shared_from_this()));
+            return holder;
+        });
+}
+
+template <typename View, typename Made>
+void addOwnMaker(PeerContext& context)
+{
+    addMaker<View>(context, [](const ObjectRef<GtkWidget>& holder, const std::shared_ptr<View>& view) {
+        show(holder.get(), *view, std::make_shared<Made>(view));
+    });
+}
+
+template <typename View>
+void addModuleMaker(PeerContext& context, const std::shared_ptr<PreviewModule>& previews,
+    Native (PreviewLibraries::*make)(const std::shared_ptr<View>&) const)
+{
+    addMaker<View>(
+        context, [previews, make](const ObjectRef<GtkWidget>& holder, const std::shared_ptr<View>& view) {
+            previews->whenLoaded([holder, make, weak = std::weak_ptr(view)](const auto& libraries) {
+                const auto shown = weak.lock();
+                if (shown && libraries)
+                    show(holder.get(), *shown, ((*libraries).*make)(shown));
+                else if (shown)
+                    shown->nativeFailed(PreviewModule::missingWords());
+            });
         });
 }
 
@@ -89,12 +114,12 @@ void PreviewNative::addShortcuts(GtkWidget* widget, const std::weak_ptr<PreviewV
     gtk_widget_add_controller(widget, controller);
 }
 
-void addPreviewMakers(PeerContext& context)
+void addPreviewMakers(PeerContext& context, const std::shared_ptr<PreviewModule>& previews)
 {
-    addMaker<components::PreviewPictureView, PictureNative>(context);
-    addMaker<components::PreviewPagesView, PagesNative>(context);
-    addMaker<components::PreviewTextView, TextNative>(context);
-    addMaker<components::PreviewMediaView, MediaNative>(context);
+    addOwnMaker<components::PreviewPictureView, PictureNative>(context);
+    addOwnMaker<components::PreviewPagesView, PagesNative>(context);
+    addModuleMaker(context, previews, &PreviewLibraries::makeTextNative);
+    addModuleMaker(context, previews, &PreviewLibraries::makeMediaNative);
 }
 
 } // namespace host::gtk

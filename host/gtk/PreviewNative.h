@@ -10,6 +10,8 @@
 
 namespace host::gtk {
 
+class PreviewModule;
+
 /// The native side of a previewed document's view. It lives as long as its widget. Main thread only.
 class PreviewNative : public platform::components::PreviewViewObserver,
                       public std::enable_shared_from_this<PreviewNative> {
@@ -24,6 +26,6 @@ protected:
 };
 
 /// Makes a context know the views of previewed documents.
-void addPreviewMakers(PeerContext& context);
+void addPreviewMakers(PeerContext& context, const std::shared_ptr<PreviewModule>& previews);
 
 } // namespace host::gtk

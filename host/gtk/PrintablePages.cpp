@@ -1,11 +1,11 @@
 #include "host/gtk/PrintablePages.h"
 
 #include "host/gtk/ObjectRef.h"
+#include "host/gtk/PreviewModule.h"
 #include "host/system/Translate.h"
 
 #include <gdk-pixbuf/gdk-pixbuf.h>
 #include <glib/gstdio.h>
-#include <poppler.h>
 
 #include <algorithm>
 #include <cerrno>
@@ -26,58 +26,6 @@ constexpr int pictureSide = 4000; ///< pixels: A4 at 340 dots to an inch
 constexpr gsize longestText = 4U << 20U; ///< bytes, some 1500 pages
 constexpr auto textFont = "Monospace 9";
 
-Error failure(const char* words, const GError* error)
-{
-    platform::PropertyDictionary info{
-        {std::string(platform::errorKey::localizedDescription), translated(words)}};
-    if (error)
-        info.emplace(std::string(platform::errorKey::localizedFailureReason), std::string(error->message));
-    return {platform::errorDomain::system, error ? error->code : EFBIG, std::move(info)};
-}
-
-/// Takes over a library's error.
-Result<Pages> failed(const char* words, GError* error)
-{
-    const std::unique_ptr<GError, decltype(&g_error_free)> owned(error, g_error_free);
-    return failure(words, owned.get());
-}
-
-/// Scales what is drawn next to fit the paper, centred, never enlarged beyond `largest`.
-void fit(GtkPrintContext* paper, double width, double height, double largest)
-{
-    auto* cairo = gtk_print_context_get_cairo_context(paper);
-    const double paperWidth = gtk_print_context_get_width(paper);
-    const double paperHeight = gtk_print_context_get_height(paper);
-    const double scale = std::min({paperWidth / width, paperHeight / height, largest});
-    cairo_translate(cairo, (paperWidth - width * scale) / 2, (paperHeight - height * scale) / 2);
-    cairo_scale(cairo, scale, scale);
-}
-
-class PdfPages : public PrintablePages {
-public:
-    explicit PdfPages(ObjectRef<PopplerDocument> document)
-        : _document(std::move(document))
-    {
-    }
-    int paginate(GtkPrintContext*) override
-    {
-        return std::max(1, poppler_document_get_n_pages(_document.get()));
-    }
-    void draw(GtkPrintContext* paper, int page) override
-    {
-        const auto content = ObjectRef<PopplerPage>::adopt(poppler_document_get_page(_document.get(), page));
-        if (!content)
-            return;
-        double width = 0, height = 0;
-        poppler_page_get_size(content.get(), &width, &height);
-        fit(paper, width, height, 1);
-        poppler_page_render_for_printing(content.get(), gtk_print_context_get_cairo_context(paper));
-    }
-
-private:
-    ObjectRef<PopplerDocument> _document;
-};
-
 class PicturePage : public PrintablePages {
 public:
     explicit PicturePage(ObjectRef<GdkPixbuf> picture)
@@ -88,7 +36,7 @@ public:
     void draw(GtkPrintContext* paper, int) override
     {
         constexpr double pointsOfPixel = 72.0 / 96;
-        fit(paper, gdk_pixbuf_get_width(_picture.get()), gdk_pixbuf_get_height(_picture.get()),
+        fitOnPaper(paper, gdk_pixbuf_get_width(_picture.get()), gdk_pixbuf_get_height(_picture.get()),
             pointsOfPixel * 2);
         auto* cairo = gtk_print_context_get_cairo_context(paper);
         gdk_cairo_set_source_pixbuf(cairo, _picture.get(), 0, 0);
@@ -158,14 +106,11 @@ private:
     std::vector<int> _starts; ///< the first line of each page
 };
 
-Result<Pages> readPdf(const std::string& path)
+Result<Pages> readPdf(const std::string& path, const PreviewModule& previews)
 {
-    GError* error = nullptr;
-    const auto file = ObjectRef<GFile>::adopt(g_file_new_for_path(path.c_str()));
-    auto* document = poppler_document_new_from_gfile(file.get(), nullptr, nullptr, &error);
-    if (!document)
-        return failed(textKey("The document is damaged or protected by a password."), error);
-    return Pages(std::make_shared<PdfPages>(ObjectRef<PopplerDocument>::adopt(document)));
+    if (const auto libraries = previews.load())
+        return libraries->readPrintablePdf(path);
+    return PreviewModule::missingError();
 }
 
 Result<Pages> readPicture(const std::string& path)
@@ -177,7 +122,7 @@ Result<Pages> readPicture(const std::string& path)
         ? gdk_pixbuf_new_from_file_at_scale(path.c_str(), pictureSide, pictureSide, TRUE, &error)
         : gdk_pixbuf_new_from_file(path.c_str(), &error);
     if (!picture)
-        return failed(textKey("The picture is damaged."), error);
+        return printingError(textKey("The picture is damaged."), error);
     const auto raw = ObjectRef<GdkPixbuf>::adopt(picture);
     return Pages(std::make_shared<PicturePage>(
         ObjectRef<GdkPixbuf>::adopt(gdk_pixbuf_apply_embedded_orientation(raw.get()))));
@@ -188,11 +133,11 @@ Result<Pages> readText(const std::string& path)
     GError* error = nullptr;
     GStatBuf status;
     if (g_stat(path.c_str(), &status) == 0 && static_cast<gsize>(status.st_size) > longestText)
-        return failure(textKey("The text is too long to be printed from here."), nullptr);
+        return printingError(textKey("The text is too long to be printed from here."), nullptr);
     char* bytes = nullptr;
     gsize length = 0;
     if (!g_file_get_contents(path.c_str(), &bytes, &length, &error))
-        return failed(textKey("The document could not be read."), error);
+        return printingError(textKey("The document could not be read."), error);
     const std::unique_ptr<char, decltype(&g_free)> owned(bytes, g_free);
     const std::unique_ptr<char, decltype(&g_free)> valid(
         g_utf8_make_valid(bytes, static_cast<gssize>(length)), g_free);
@@ -201,11 +146,31 @@ Result<Pages> readText(const std::string& path)
 
 } // namespace
 
-Result<Pages> readPrintablePages(const std::string& path, PrintableKind kind)
+void fitOnPaper(GtkPrintContext* paper, double width, double height, double largest)
+{
+    auto* cairo = gtk_print_context_get_cairo_context(paper);
+    const double paperWidth = gtk_print_context_get_width(paper);
+    const double paperHeight = gtk_print_context_get_height(paper);
+    const double scale = std::min({paperWidth / width, paperHeight / height, largest});
+    cairo_translate(cairo, (paperWidth - width * scale) / 2, (paperHeight - height * scale) / 2);
+    cairo_scale(cairo, scale, scale);
+}
+
+Error printingError(const char* words, GError* error)
+{
+    const std::unique_ptr<GError, decltype(&g_error_free)> owned(error, g_error_free);
+    platform::PropertyDictionary info{
+        {std::string(platform::errorKey::localizedDescription), translated(words)}};
+    if (error)
+        info.emplace(std::string(platform::errorKey::localizedFailureReason), std::string(error->message));
+    return {platform::errorDomain::system, error ? error->code : EFBIG, std::move(info)};
+}
+
+Result<Pages> readPrintablePages(const std::string& path, PrintableKind kind, const PreviewModule& previews)
 {
     switch (kind) {
     case PrintableKind::Pdf:
-        return readPdf(path);
+        return readPdf(path, previews);
     case PrintableKind::Picture:
         return readPicture(path);
     case PrintableKind::Text:

@@ -19,10 +19,19 @@ public:
     virtual void draw(GtkPrintContext* paper, int page) = 0;
 };
 
+class PreviewModule;
+
 enum class PrintableKind : int { Pdf, Picture, Text };
 
-/// Reads a document. Any thread; may take long. Errors: what the file is damaged or too large for, in words.
+/// Reads a document; a PDF document with the libraries of the previews. Any thread; may take long. Errors:
+/// what the file is damaged or too large for, in words.
 platform::Result<std::shared_ptr<PrintablePages>> readPrintablePages(
-    const std::string& path, PrintableKind kind);
+    const std::string& path, PrintableKind kind, const PreviewModule& previews);
+
+/// Scales what is drawn next to fit the paper, centred, never enlarged beyond `largest`.
+void fitOnPaper(GtkPrintContext* paper, double width, double height, double largest);
+/// Why a document cannot be printed: words that are looked up, with what a library says. Takes that over;
+/// null: none.
+platform::Error printingError(const char* words, GError* error);
 
 } // namespace host::gtk

@@ -18,17 +18,18 @@ constexpr double lowWindow = 480; ///< points; lower is compact
 
 } // namespace
 
-std::shared_ptr<WindowPeer> WindowPeer::make(
-    AdwApplication* application, const std::shared_ptr<ui::Window>& window, const WindowSize& size)
+std::shared_ptr<WindowPeer> WindowPeer::make(AdwApplication* application,
+    const std::shared_ptr<ui::Window>& window, const WindowSize& size,
+    const std::shared_ptr<PreviewModule>& previews)
 {
-    auto peer = std::make_shared<WindowPeer>(application, window, size);
+    auto peer = std::make_shared<WindowPeer>(application, window, size, previews);
     window->setObserver(peer);
     peer->showRoot();
     return peer;
 }
 
-WindowPeer::WindowPeer(
-    AdwApplication* application, const std::shared_ptr<ui::Window>& window, const WindowSize& size)
+WindowPeer::WindowPeer(AdwApplication* application, const std::shared_ptr<ui::Window>& window,
+    const WindowSize& size, const std::shared_ptr<PreviewModule>& previews)
     : _model(window)
     , _theme(std::make_shared<Theme>())
     , _measurer(std::make_shared<PangoTextMeasurer>(_theme))
@@ -38,7 +39,7 @@ WindowPeer::WindowPeer(
     build(application, size);
     _theme->setReference(_window.get());
     _theme->setOnChange([this] { themeChanged(); });
-    addPreviewMakers(*_context);
+    addPreviewMakers(*_context, previews);
     _context->scheduler().attach(_window.get());
     ui::TextMeasurer::install(_measurer);
     connectWindow();

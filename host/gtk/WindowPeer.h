@@ -14,6 +14,8 @@
 
 namespace host::gtk {
 
+class PreviewModule;
+
 /// How large the window was when it was last open.
 struct WindowSize {
     int width = 900, height = 700; ///< points
@@ -26,9 +28,10 @@ class WindowPeer : public platform::ui::WindowObserver, public std::enable_share
 public:
     /// `application` may be null: the window then stands for itself.
     static std::shared_ptr<WindowPeer> make(AdwApplication* application,
-        const std::shared_ptr<platform::ui::Window>& window, const WindowSize& size);
+        const std::shared_ptr<platform::ui::Window>& window, const WindowSize& size,
+        const std::shared_ptr<PreviewModule>& previews);
     WindowPeer(AdwApplication* application, const std::shared_ptr<platform::ui::Window>& window,
-        const WindowSize& size);
+        const WindowSize& size, const std::shared_ptr<PreviewModule>& previews);
     ~WindowPeer() override;
 
     void show();

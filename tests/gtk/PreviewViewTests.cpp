@@ -1,8 +1,8 @@
 #include "GtkEnvironment.h"
 #include "WindowFixture.h"
+#include "host/previews/PopplerDocuments.h"
 #include "host/system/GLibDispatch.h"
 #include "host/system/IcuFormatters.h"
-#include "host/system/PopplerDocuments.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Services.h"
 #include "platform/components/PreviewMediaView.h"
@@ -34,7 +34,7 @@ protected:
         set.formatters = std::make_shared<host::system::IcuFormatters>("en_US");
         set.localization = std::make_shared<testing_support::PlainTexts>();
         set.notificationCenter = std::make_shared<platform::NotificationCenter>();
-        set.pagedDocumentOpener = std::make_shared<host::system::PopplerDocuments>();
+        set.pagedDocumentOpener = std::make_shared<host::previews::PopplerDocuments>();
         platform::installServices(std::move(set));
     }
 

@@ -1,3 +1,4 @@
+#include "WindowFixture.h"
 #include "host/gtk/ObjectRef.h"
 #include "host/gtk/PrintRun.h"
 #include "platform/Services.h"
@@ -26,7 +27,8 @@ protected:
     /// The pages that come out when a document is printed into a file; -1 when it cannot be.
     int printed(const std::string& name, PrintableKind kind) const
     {
-        const auto pages = host::gtk::readPrintablePages(folder.at(name), kind);
+        const auto pages =
+            host::gtk::readPrintablePages(folder.at(name), kind, *testing_support::linkedPreviews());
         if (!pages)
             return pages.error->text(platform::errorKey::localizedDescription)->empty() ? -2 : -1;
         const auto out = folder.at(name + ".out.pdf");

@@ -1,6 +1,7 @@
 #include "WindowFixture.h"
 
 #include "GtkEnvironment.h"
+#include "host/previews/MakePreviewLibraries.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Services.h"
 #include "platform/ui/NavigationItem.h"
@@ -29,8 +30,18 @@ GtkWidget* find(GtkWidget* widget, const std::function<bool(GtkWidget*)>& matche
 
 } // namespace
 
+std::shared_ptr<host::gtk::PreviewModule> linkedPreviews()
+{
+    return std::make_shared<host::gtk::PreviewModule>([] {
+        std::shared_ptr<host::gtk::PreviewLibraries> made;
+        trwMakePreviewLibraries(made);
+        return made;
+    });
+}
+
 WindowFixture::WindowFixture()
-    : host(std::make_shared<host::gtk::GtkWindowHost>(nullptr, host::gtk::WindowSize{400, 700, false}))
+    : host(std::make_shared<host::gtk::GtkWindowHost>(
+        nullptr, host::gtk::WindowSize{400, 700, false}, linkedPreviews()))
     , window(std::make_shared<ui::Window>())
 {
     platform::ServiceSet set;

@@ -2,6 +2,7 @@
 
 #include "host/gtk/GtkWindowHost.h"
 #include "host/gtk/NavigationPeer.h"
+#include "host/gtk/PreviewModule.h"
 #include "host/gtk/ViewPeer.h"
 #include "platform/ui/NavigationController.h"
 #include "platform/ui/Window.h"
@@ -14,6 +15,9 @@
 #include <vector>
 
 namespace testing_support {
+
+/// The libraries of the previews that are linked with the test.
+std::shared_ptr<host::gtk::PreviewModule> linkedPreviews();
 
 /// A real window of 400 to 700 points. A test fails when the toolkit warned of anything.
 class WindowFixture : public ::testing::Test {

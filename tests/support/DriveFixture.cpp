@@ -11,7 +11,7 @@
 #include "host/system/JsonUserDefaults.h"
 #include "host/system/LocalFileCoordinator.h"
 #include "host/system/MimeTypeRegistry.h"
-#include "host/system/PopplerDocuments.h"
+#include "host/previews/PopplerDocuments.h"
 #include "host/system/PosixFileSystem.h"
 #include "host/system/TypePreviewSupport.h"
 #include "host/system/UnicodeCharacterData.h"
@@ -76,7 +76,7 @@ DriveFixture::DriveFixture()
             }});
     set.characterData = std::make_shared<host::system::UnicodeCharacterData>();
     set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
-    set.pagedDocumentOpener = std::make_shared<host::system::PopplerDocuments>();
+    set.pagedDocumentOpener = std::make_shared<host::previews::PopplerDocuments>();
     set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
     set.localization = englishTexts();
     set.typeRegistry = types();

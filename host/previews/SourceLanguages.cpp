@@ -1,4 +1,4 @@
-#include "host/gtk/SourceLanguages.h"
+#include "host/previews/SourceLanguages.h"
 
 #include "platform/Dispatch.h"
 #include "platform/Services.h"
@@ -6,7 +6,9 @@
 #include <memory>
 #include <utility>
 
-namespace host::gtk::SourceLanguages {
+namespace host::previews::SourceLanguages {
+
+using gtk::ObjectRef;
 
 namespace {
 
@@ -31,4 +33,4 @@ void guess(const std::string& fileName, Answer answer)
     });
 }
 
-} // namespace host::gtk::SourceLanguages
+} // namespace host::previews::SourceLanguages

@@ -2,7 +2,7 @@
 
 #include "platform/PagedDocument.h"
 
-namespace host::system {
+namespace host::previews {
 
 /// Opens PDF documents with Poppler. A page is drawn by the thread that asks, so ask on a worker.
 class PopplerDocuments : public platform::PagedDocumentOpener {
@@ -10,4 +10,4 @@ public:
     platform::Result<std::shared_ptr<platform::PagedDocument>> open(const std::string& path) const override;
 };
 
-} // namespace host::system
+} // namespace host::previews

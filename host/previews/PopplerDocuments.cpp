@@ -1,4 +1,4 @@
-#include "host/system/PopplerDocuments.h"
+#include "host/previews/PopplerDocuments.h"
 
 #include "host/system/SystemErrors.h"
 
@@ -14,8 +14,9 @@
 #include <optional>
 #include <utility>
 
-namespace host::system {
+namespace host::previews {
 
+using host::system::systemError;
 using platform::Error;
 using platform::Image;
 using platform::PagedDocument;
@@ -209,4 +210,4 @@ Result<std::shared_ptr<PagedDocument>> PopplerDocuments::open(const std::string&
     return std::shared_ptr<PagedDocument>(std::make_shared<PopplerPages>(std::move(document)));
 }
 
-} // namespace host::system
+} // namespace host::previews

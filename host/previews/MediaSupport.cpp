@@ -1,4 +1,4 @@
-#include "host/gtk/MediaSupport.h"
+#include "host/previews/MediaSupport.h"
 
 #include "platform/Dispatch.h"
 #include "platform/Localization.h"
@@ -10,7 +10,7 @@
 #include <memory>
 #include <utility>
 
-namespace host::gtk::MediaSupport {
+namespace host::previews::MediaSupport {
 
 namespace {
 
@@ -62,4 +62,4 @@ std::string wordsFor(const char* domain, int code)
     return platform::localized("The recording is damaged.");
 }
 
-} // namespace host::gtk::MediaSupport
+} // namespace host::previews::MediaSupport

@@ -7,11 +7,11 @@
 
 #include <string>
 
-namespace host::gtk {
+namespace host::previews {
 
 /// Shows a text to be read and selected, sources in the colours of their language. A long text is put in
 /// piece by piece; of a text that has changed, only the part that differs.
-class TextNative : public PreviewNative {
+class TextNative : public gtk::PreviewNative {
 public:
     explicit TextNative(const std::shared_ptr<platform::components::PreviewTextView>& view);
     ~TextNative() override;
@@ -42,21 +42,21 @@ private:
     void unmarkMatch();
 
     std::weak_ptr<platform::components::PreviewTextView> _view;
-    ObjectRef<GtkWidget> _window;
-    ObjectRef<GtkSourceBuffer> _buffer;
-    ObjectRef<GtkSourceSearchContext> _search;
-    ObjectRef<GtkSourceLanguage> _language;
-    ObjectRef<GtkCssProvider> _style;
+    gtk::ObjectRef<GtkWidget> _window;
+    gtk::ObjectRef<GtkSourceBuffer> _buffer;
+    gtk::ObjectRef<GtkSourceSearchContext> _search;
+    gtk::ObjectRef<GtkSourceLanguage> _language;
+    gtk::ObjectRef<GtkCssProvider> _style;
     GtkWidget* _text;
     GtkTextTag* _marked; ///< the buffer's, for the match that the search stands at
     std::string _shown; ///< what the buffer has or is about to have
     std::size_t _inserted = 0, _insertEnd = 0; ///< bytes of `_shown`: what is missing in the buffer
-    ObjectRef<GtkTextMark> _insertPlace;
+    gtk::ObjectRef<GtkTextMark> _insertPlace;
     guint _inserting = 0;
     std::string _fileName;
     double _pinchStart = 1;
-    SignalConnection _onCount;
-    SignalConnections _connections;
+    gtk::SignalConnection _onCount;
+    gtk::SignalConnections _connections;
 };
 
-} // namespace host::gtk
+} // namespace host::previews

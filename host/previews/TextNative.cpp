@@ -1,6 +1,6 @@
-#include "host/gtk/TextNative.h"
+#include "host/previews/TextNative.h"
 
-#include "host/gtk/SourceLanguages.h"
+#include "host/previews/SourceLanguages.h"
 
 #include <adwaita.h>
 
@@ -8,8 +8,12 @@
 #include <cmath>
 #include <utility>
 
-namespace host::gtk {
+namespace host::previews {
 
+using gtk::connectNotify;
+using gtk::connectSignal;
+using gtk::ObjectRef;
+using gtk::PreviewNative;
 using platform::components::MatchStep;
 using platform::components::PreviewTextView;
 using platform::components::PreviewView;
@@ -353,4 +357,4 @@ void TextNative::previewShouldTakeFocus()
     gtk_widget_grab_focus(_text);
 }
 
-} // namespace host::gtk
+} // namespace host::previews

@@ -3,7 +3,7 @@
 #include <functional>
 #include <string>
 
-namespace host::gtk {
+namespace host::previews {
 
 /// Whether this machine can play sound and films.
 namespace MediaSupport {
@@ -17,4 +17,4 @@ std::string wordsFor(const char* domain, int code);
 
 } // namespace MediaSupport
 
-} // namespace host::gtk
+} // namespace host::previews

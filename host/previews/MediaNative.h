@@ -3,10 +3,10 @@
 #include "host/gtk/PreviewNative.h"
 #include "platform/components/PreviewMediaView.h"
 
-namespace host::gtk {
+namespace host::previews {
 
 /// Plays sound and films in the toolkit's player.
-class MediaNative : public PreviewNative {
+class MediaNative : public gtk::PreviewNative {
 public:
     explicit MediaNative(const std::shared_ptr<platform::components::PreviewMediaView>& view);
     ~MediaNative() override;
@@ -27,11 +27,11 @@ private:
     void checkError();
 
     std::weak_ptr<platform::components::PreviewMediaView> _view;
-    ObjectRef<GtkWidget> _box;
-    ObjectRef<GtkMediaStream> _stream;
+    gtk::ObjectRef<GtkWidget> _box;
+    gtk::ObjectRef<GtkMediaStream> _stream;
     GtkWidget* _player = nullptr; ///< in the box
     unsigned _generation = 0; ///< of the content; an answer for an older one is ignored
-    SignalConnections _connections, _streamConnections;
+    gtk::SignalConnections _connections, _streamConnections;
 };
 
-} // namespace host::gtk
+} // namespace host::previews

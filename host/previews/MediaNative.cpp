@@ -1,11 +1,13 @@
-#include "host/gtk/MediaNative.h"
+#include "host/previews/MediaNative.h"
 
-#include "host/gtk/MediaSupport.h"
+#include "host/previews/MediaSupport.h"
 
 #include <utility>
 
-namespace host::gtk {
+namespace host::previews {
 
+using gtk::connectNotify;
+using gtk::ObjectRef;
 using platform::components::PreviewMediaView;
 
 namespace {
@@ -117,4 +119,4 @@ void MediaNative::previewShouldTakeFocus()
     gtk_widget_child_focus(widget(), GTK_DIR_TAB_FORWARD);
 }
 
-} // namespace host::gtk
+} // namespace host::previews

@@ -7,16 +7,16 @@
 #include <functional>
 #include <string>
 
-namespace host::gtk {
+namespace host::previews {
 
 /// The languages of sources that the desktop knows how to colour.
 namespace SourceLanguages {
 
 /// Finds the language of a file name, off the main thread (the first time, all descriptions are read); the
 /// answer comes on the main queue, null for none. Main thread.
-using Answer = std::function<void(const ObjectRef<GtkSourceLanguage>& language)>;
+using Answer = std::function<void(const gtk::ObjectRef<GtkSourceLanguage>& language)>;
 void guess(const std::string& fileName, Answer answer);
 
 } // namespace SourceLanguages
 
-} // namespace host::gtk
+} // namespace host::previews

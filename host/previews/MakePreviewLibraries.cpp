@@ -1,0 +1,45 @@
+#include "host/previews/MakePreviewLibraries.h"
+
+#include "host/previews/MediaNative.h"
+#include "host/previews/PdfPrinting.h"
+#include "host/previews/PopplerDocuments.h"
+#include "host/previews/TextNative.h"
+
+namespace host::previews {
+
+namespace {
+
+namespace components = platform::components;
+using gtk::PreviewNative;
+
+class Libraries : public gtk::PreviewLibraries {
+public:
+    const platform::PagedDocumentOpener& pagedDocuments() const override { return _documents; }
+    platform::Result<std::shared_ptr<gtk::PrintablePages>> readPrintablePdf(
+        const std::string& path) const override
+    {
+        return previews::readPrintablePdf(path);
+    }
+    std::shared_ptr<PreviewNative> makeTextNative(
+        const std::shared_ptr<components::PreviewTextView>& view) const override
+    {
+        return std::make_shared<TextNative>(view);
+    }
+    std::shared_ptr<PreviewNative> makeMediaNative(
+        const std::shared_ptr<components::PreviewMediaView>& view) const override
+    {
+        return std::make_shared<MediaNative>(view);
+    }
+
+private:
+    PopplerDocuments _documents;
+};
+
+} // namespace
+
+} // namespace host::previews
+
+void trwMakePreviewLibraries(std::shared_ptr<host::gtk::PreviewLibraries>& made)
+{
+    made = std::make_shared<host::previews::Libraries>();
+}

@@ -1,0 +1,10 @@
+#pragma once
+
+#include "host/gtk/PrintablePages.h"
+
+namespace host::previews {
+
+/// Reads a PDF document to be printed. Any thread; may take long. Errors: why it cannot be, in words.
+platform::Result<std::shared_ptr<gtk::PrintablePages>> readPrintablePdf(const std::string& path);
+
+} // namespace host::previews
