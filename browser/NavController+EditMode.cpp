@@ -66,6 +66,8 @@ void NavController::configureNavBar(const List& list)
         ? std::make_shared<BarButtonItem>(SystemItem::Cancel, calling(&NavController::endEditMode))
         : std::make_shared<BarButtonItem>(
             platform::localized("Select"), calling(&NavController::beginEditMode));
+    if (!_editMode)
+        button->setCompactImage(platform::Image::named("selection-mode-symbolic"));
     list->navigationItem().setRightItem(button);
     list->navigationItem().setHidesBackButton(_editMode);
     list->setTitle(_editMode ? platform::localized("Select Items") : _viewTitle);

@@ -6,6 +6,7 @@
 #include "platform/Localization.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace host::gtk {
 
@@ -40,8 +41,10 @@ std::string nameOf(const ui::BarButtonItem& item)
     return item.systemItem() == ui::SystemItem::Plain ? name : platform::localized(name);
 }
 
-std::optional<platform::Image> imageOf(const ui::BarButtonItem& item)
+std::optional<platform::Image> imageOf(const ui::BarButtonItem& item, bool isNarrow)
 {
+    if (isNarrow && item.compactImage())
+        return item.compactImage();
     if (item.image())
         return item.image();
     const char* icon = iconOf(item.systemItem());
@@ -125,21 +128,36 @@ void BarItemPeer::barButtonItemDidChange(ui::BarButtonItem&)
     });
 }
 
+void BarItemPeer::setNarrow(bool narrow)
+{
+    const auto shown = item();
+    if (narrow == std::exchange(_isNarrow, narrow) || !shown)
+        return;
+    mirror(*shown);
+}
+
+void BarItemPeer::showFace(const ui::BarButtonItem& shown)
+{
+    auto* button = GTK_BUTTON(widget());
+    const auto image = imageOf(shown, _isNarrow);
+    if (image) {
+        auto* icon = gtk_image_new();
+        ImagePaint::show(GTK_IMAGE(icon), *image, iconSize);
+        gtk_button_set_child(button, icon);
+    } else {
+        const auto title = shown.title().empty() ? nameOf(shown) : shown.title();
+        gtk_button_set_label(button, title.c_str());
+    }
+    gtk_widget_remove_css_class(widget(), image ? "text-button" : "image-button");
+    gtk_widget_add_css_class(widget(), image ? "image-button" : "text-button");
+    gtk_widget_set_tooltip_text(widget(), image ? nameOf(shown).c_str() : nullptr);
+}
+
 void BarItemPeer::mirror(const ui::BarButtonItem& shown)
 {
     if (_customPeer)
         return;
-    auto* button = GTK_BUTTON(widget());
-    if (const auto image = imageOf(shown)) {
-        auto* icon = gtk_image_new();
-        ImagePaint::show(GTK_IMAGE(icon), *image, iconSize);
-        gtk_button_set_child(button, icon);
-        gtk_widget_add_css_class(widget(), "image-button");
-    } else {
-        const auto title = shown.title().empty() ? nameOf(shown) : shown.title();
-        gtk_button_set_label(button, title.c_str());
-        gtk_widget_add_css_class(widget(), "text-button");
-    }
+    showFace(shown);
     if (shown.systemItem() == ui::SystemItem::Done)
         gtk_widget_add_css_class(widget(), "suggested-action");
     gtk_widget_set_sensitive(widget(), shown.isEnabled());

@@ -23,12 +23,16 @@ public:
     GtkWidget* widget() const { return _widget.get(); }
     std::shared_ptr<platform::ui::BarButtonItem> item() const { return _item.lock(); }
 
+    /// In a narrow bar an entry that has a compact image shows it in place of its title.
+    void setNarrow(bool narrow);
+
     void barButtonItemDidChange(platform::ui::BarButtonItem& item) override;
 
 private:
     void showCustomView(const std::shared_ptr<platform::ui::View>& view);
     void showButton();
     void mirror(const platform::ui::BarButtonItem& item);
+    void showFace(const platform::ui::BarButtonItem& item);
 
     std::shared_ptr<PeerContext> _context;
     std::weak_ptr<platform::ui::BarButtonItem> _item;
@@ -36,6 +40,7 @@ private:
     ObjectRef<GtkWidget> _widget;
     std::shared_ptr<ViewPeer> _customPeer;
     SignalConnection _onClicked;
+    bool _isNarrow = false;
 };
 
 /// A view of the kit at a place of its own in the toolkit's layout: the place asks for the size that the view

@@ -114,6 +114,7 @@ void NavigationBarPeer::showItems(const ui::NavigationItem& item)
         if (entry->isSpace())
             return;
         _peers.push_back(BarItemPeer::make(_context, entry));
+        _peers.back()->setNarrow(_isNarrow);
         pack(ADW_HEADER_BAR(widget()), _peers.back()->widget());
     };
     for (const auto& entry : _left)
@@ -124,6 +125,9 @@ void NavigationBarPeer::showItems(const ui::NavigationItem& item)
 
 void NavigationBarPeer::setNarrow(bool narrow)
 {
+    _isNarrow = narrow;
+    for (const auto& peer : _peers)
+        peer->setNarrow(narrow);
     adw_header_bar_set_decoration_layout(ADW_HEADER_BAR(widget()), narrow ? ":close" : nullptr);
 }
 

@@ -25,7 +25,8 @@ public:
 
     /// `hasBackTarget` says whether there is a screen to go back to.
     void show(const platform::ui::NavigationItem& item, bool hasBackTarget);
-    /// A narrow bar keeps of the window's own buttons only the one that closes it.
+    /// A narrow bar keeps of the window's own buttons only the one that closes it, and of its entries the
+    /// compact images.
     void setNarrow(bool narrow);
     /// Whether the window's own buttons stand in this bar.
     void setWindowButtons(bool shown);
@@ -44,6 +45,7 @@ private:
     std::function<void()> _onBack, _onSearch;
     std::function<platform::ui::Menu()> _makeMenu;
     SignalConnections _connections;
+    bool _isNarrow = false;
 };
 
 } // namespace host::gtk

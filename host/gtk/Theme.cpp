@@ -18,6 +18,9 @@ namespace {
 
 constexpr double bodyPointSize = 17; ///< of the kit's body text
 constexpr double defaultDpi = 96;
+/// Of the text colour. Grey text must stand out from its background by 4.5 to 1, with high contrast by 7
+/// to 1.
+constexpr float greyShare = 0.7F, strongGreyShare = 0.9F, lightGreyShare = 0.4F;
 
 GdkRGBA plain(const Color& color)
 {
@@ -87,13 +90,26 @@ Theme::~Theme() = default;
 
 void Theme::changed() const
 {
+    markContrast();
     if (_onChange)
         _onChange();
+}
+
+/// The style sheet cannot ask for the contrast, but for a class of the window.
+void Theme::markContrast() const
+{
+    if (!_reference)
+        return;
+    if (hasHighContrast())
+        gtk_widget_add_css_class(_reference, "high-contrast");
+    else
+        gtk_widget_remove_css_class(_reference, "high-contrast");
 }
 
 void Theme::setReference(GtkWidget* widget)
 {
     _reference = widget;
+    markContrast();
     _onReferenceEnd = connectSignal<void()>(widget, "destroy", [this] { _reference = nullptr; });
 }
 
@@ -113,9 +129,16 @@ GdkRGBA Theme::resolve(const Color& color, ColorUse use) const
     // Grey text is the text colour, let through in part, so that it can be read on either background.
     if (color == StandardColors::gray || color == StandardColors::lightGray) {
         if (named("view_fg_color", found))
-            found.alpha *= color == StandardColors::gray ? 0.6F : 0.4F;
+            found.alpha *= color == StandardColors::lightGray ? lightGreyShare
+                : hasHighContrast()                           ? strongGreyShare
+                                                              : greyShare;
     }
     return found;
+}
+
+bool Theme::hasHighContrast()
+{
+    return adw_style_manager_get_high_contrast(adw_style_manager_get_default());
 }
 
 bool Theme::isDark() const

@@ -41,6 +41,8 @@ public:
 
 private:
     void changed() const;
+    void markContrast() const;
+    static bool hasHighContrast();
     bool named(const char* name, GdkRGBA& color) const;
 
     GtkWidget* _reference = nullptr;

@@ -10,6 +10,16 @@ namespace {
 
 constexpr std::string_view replacement = "\xEF\xBF\xBD";
 
+/// The overrides, embeddings and isolates of Unicode's bidirectional algorithm all begin with these bytes.
+constexpr std::string_view embeddings = "\xE2\x80", isolates = "\xE2\x81";
+
+bool turnsDirection(std::string_view character)
+{
+    const auto last = static_cast<unsigned char>(character.back());
+    return (character.starts_with(embeddings) && last >= 0xAA && last <= 0xAE) // U+202A to U+202E
+        || (character.starts_with(isolates) && last >= 0xA6 && last <= 0xA9); // U+2066 to U+2069
+}
+
 bool isControl(char c)
 {
     const auto byte = static_cast<unsigned char>(c);
@@ -32,12 +42,13 @@ std::string displayName(std::string_view bytes)
 {
     std::string shown;
     shown.reserve(bytes.size());
-    if (isValidUtf8(bytes)) {
+    if (isValidUtf8(bytes) && bytes.find(embeddings) == bytes.npos && bytes.find(isolates) == bytes.npos) {
         shown = bytes;
     } else {
         while (!bytes.empty()) {
             const auto length = leadingCharacter(bytes);
-            shown += length ? bytes.substr(0, length) : replacement;
+            const auto character = bytes.substr(0, length);
+            shown += length && !turnsDirection(character) ? character : replacement;
             bytes.remove_prefix(std::max<std::size_t>(length, 1));
         }
     }

@@ -5,8 +5,9 @@
 
 namespace platform::components {
 
-/// A file name as text for the screen: bytes that are no UTF-8 show as the replacement character, control
-/// characters as a blank.
+/// A file name as text for the screen: bytes that are no UTF-8 show as the replacement character, as does
+/// what turns the direction of the text and so could disguise an extension; control characters show as a
+/// blank.
 std::string displayName(std::string_view bytes);
 
 /// The extension of a name without its dot; empty for none.

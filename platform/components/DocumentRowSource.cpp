@@ -3,6 +3,7 @@
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"
+#include "platform/components/DetailText.h"
 #include "platform/components/DisplayName.h"
 #include "platform/components/RowThumbnail.h"
 #include "platform/ui/ListView.h"
@@ -101,7 +102,7 @@ ui::ListRow DocumentRowSource::rowAtIndex(const ui::ListView&, std::size_t index
     if (isKnown && known->second.thumbnail)
         row.image = known->second.thumbnail;
     if (_places)
-        row.detail = _places(_rows->url(index)) + (row.detail.empty() ? "" : " · " + row.detail);
+        row.detail = joinedDetails(_places(_rows->url(index)), row.detail);
     row.accessibleDescription = spokenDescription(
         row, spokenKind(entry), isKnown ? known->second.details.tagNames : std::vector<std::string>());
     return row;

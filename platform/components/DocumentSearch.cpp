@@ -46,6 +46,7 @@ void DocumentSearch::build()
         std::shared_ptr<ui::ListViewDelegate>(shared_from_this(), static_cast<ui::ListViewDelegate*>(this)));
     _placeholder = PlaceholderView::create();
     _placeholder->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
+    showState({});
     _presentation = std::make_shared<ui::SearchPresentation>();
     _presentation->setPlaceholder(localized("Search"));
     const auto& view = _presentation->view();
@@ -99,13 +100,17 @@ void DocumentSearch::resultsArrived(const NameSearchResults& results)
 
 void DocumentSearch::showState(const NameSearchResults& results)
 {
-    if (results.isComplete)
+    if (results.query.empty())
+        _placeholder->setContent({.iconName = "edit-find-symbolic",
+            .title = localized("Search the whole drive"),
+            .message = localized("Find folders and documents by their names.")});
+    else if (results.isComplete)
         _placeholder->setContent({.iconName = "edit-find-symbolic",
             .title = localized("Nothing found"),
             .message = localized("No item of the drive has a name with this text.")});
     else
         _placeholder->setContent({.message = localized("Searching…"), .isBusy = true});
-    _placeholder->setHidden(results.total > 0 || results.query.empty());
+    _placeholder->setHidden(results.total > 0);
 }
 
 void DocumentSearch::rowActivated(ui::ListView&, std::size_t index)

@@ -2,6 +2,7 @@
 
 #include "platform/CloudDocumentService.h"
 #include "platform/Services.h"
+#include "platform/components/DetailText.h"
 #include "platform/components/DisplayName.h"
 
 namespace platform::components {
@@ -39,7 +40,7 @@ std::string folderTitle(const Url& folder)
     const auto values =
         services().cloudDocumentService().promisedItems().promisedItemResourceValues(folder, key);
     const auto* name = values ? values->get<std::string>(AttributeKey::LocalizedName) : nullptr;
-    return name && !name->empty() ? *name : displayName(folder.lastPathComponent());
+    return displayName(name && !name->empty() ? *name : folder.lastPathComponent());
 }
 
 std::vector<FolderSnapshot::ExtraItem> extraItemsOf(const Url& folder)
@@ -80,7 +81,7 @@ std::string placeText(const Url& item)
     const auto way = foldersDownTo(item.deletingLastPathComponent());
     std::string text;
     for (std::size_t i = way.size() > 1 ? 1 : 0; i < way.size(); ++i)
-        text += (text.empty() ? "" : " › ") + folderTitle(way[i]);
+        text = joinedPlace(text, folderTitle(way[i]));
     return text;
 }
 

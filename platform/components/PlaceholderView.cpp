@@ -14,7 +14,8 @@ namespace {
 
 constexpr double margin = 24;
 constexpr double lineSpacing = 12;
-constexpr double iconAlpha = 0.5; ///< what is said is in the words
+/// Of a plain symbol: what is said is in the words. An icon in colour is what the screen is about.
+constexpr double symbolAlpha = 0.5;
 
 std::shared_ptr<ui::Label> makeLabel(const ui::Font& font)
 {
@@ -46,7 +47,6 @@ void PlaceholderView::build()
     _spinner = std::make_shared<ui::ActivityIndicator>();
     _icon = std::make_shared<ui::ImageView>();
     _icon->setContentMode(ui::ContentMode::AspectFit);
-    _icon->setAlpha(iconAlpha);
     _icon->setAccessibility({.label = {}, .hint = {}, .isHidden = true});
     _title = makeLabel(ui::Font::preferred(ui::TextStyle::Title2).bold());
     _message = makeLabel(ui::Font::preferred(ui::TextStyle::Body));
@@ -81,6 +81,7 @@ void PlaceholderView::setContent(const Content& content)
     const bool hasIcon = !content.isBusy && !content.iconName.empty();
     _icon->setHidden(!hasIcon);
     _icon->setImage(hasIcon ? std::optional(Image::named(content.iconName)) : std::nullopt);
+    _icon->setAlpha(content.iconName.ends_with("-symbolic") ? symbolAlpha : 1);
     show(*_title, content.title);
     show(*_message, content.message);
     setNeedsLayout();

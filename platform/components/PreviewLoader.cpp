@@ -7,6 +7,7 @@
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"
+#include "platform/components/DetailText.h"
 #include "platform/components/DisplayName.h"
 #include "platform/components/ErrorWords.h"
 #include "platform/components/TextDecoding.h"
@@ -34,13 +35,12 @@ std::string textOf(const AttributeMap& values, AttributeKey key)
 
 std::string kindAndSize(const AttributeMap& values)
 {
-    auto note = textOf(values, AttributeKey::LocalizedTypeDescription);
+    auto kind = textOf(values, AttributeKey::LocalizedTypeDescription);
     const auto* size = values.get<std::uint64_t>(AttributeKey::FileSize);
     if (!size)
-        return note;
-    if (!note.empty())
-        note += " · ";
-    return note + services().formatters().byteCount(*size, ByteCountStyle::File, ByteCountUnit::Included);
+        return kind;
+    return joinedDetails(
+        kind, services().formatters().byteCount(*size, ByteCountStyle::File, ByteCountUnit::Included));
 }
 
 PreviewContent summary(const Url& url, const AttributeMap& values)

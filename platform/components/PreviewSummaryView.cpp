@@ -16,6 +16,7 @@ namespace {
 
 constexpr double margin = 24;
 constexpr double lineSpacing = 12;
+constexpr double symbolAlpha = 0.5; ///< of a plain symbol, which only goes with the words
 constexpr double buttonHeight = 48, buttonWidth = 200;
 
 std::shared_ptr<ui::Label> makeLabel(const ui::Font& font)
@@ -97,6 +98,7 @@ void PreviewSummaryView::setContent(const Content& content)
     const bool hasIcon = !content.iconName.empty();
     _icon->setHidden(!hasIcon);
     _icon->setImage(hasIcon ? std::optional(Image::named(content.iconName)) : std::nullopt);
+    _icon->setAlpha(content.iconName.ends_with("-symbolic") ? symbolAlpha : 1);
     show(*_title, content.title);
     show(*_message, content.message);
     showProgress();

@@ -5,6 +5,7 @@
 #include "platform/Formatters.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
+#include "platform/components/DetailText.h"
 
 #include <filesystem>
 #include <system_error>
@@ -51,21 +52,14 @@ std::string sizeText(const Url& url, FolderEntryKind kind, const AttributeMap& v
                 : std::string();
 }
 
-void appendPart(std::string& text, const std::string& part)
-{
-    if (!text.empty() && !part.empty())
-        text += " · ";
-    text += part;
-}
-
 void describe(RowDetails& details, const Url& url, FolderEntryKind kind, const AttributeMap& values)
 {
     details.name = values.optional<std::string>(AttributeKey::LocalizedName);
     if (const auto* date = values.get<Date>(AttributeKey::ContentModificationDate))
         details.text = services().formatters().date(*date, DateStyle::Medium, DateStyle::None);
-    appendPart(details.text, sizeText(url, kind, values));
+    details.text = joinedDetails(details.text, sizeText(url, kind, values));
     if (values.flag(AttributeKey::IsShared))
-        appendPart(details.text, localized("Shared"));
+        details.text = joinedDetails(details.text, localized("Shared"));
     const auto* status = values.get<DownloadingStatus>(AttributeKey::DownloadingStatus);
     if (status && *status == DownloadingStatus::NotDownloaded)
         details.download = ui::DownloadState::InCloud;

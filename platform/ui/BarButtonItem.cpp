@@ -75,6 +75,12 @@ void BarButtonItem::setTitle(std::string title)
     changed();
 }
 
+void BarButtonItem::setCompactImage(Image image)
+{
+    _compactImage = std::move(image);
+    changed();
+}
+
 void BarButtonItem::setAccessibilityLabel(std::string label)
 {
     _accessibilityLabel = std::move(label);

@@ -42,6 +42,9 @@ public:
     const std::string& title() const { return _title; }
     void setTitle(std::string title);
     const std::optional<Image>& image() const { return _image; }
+    /// Stands for the title in a bar that is narrow, so that the screen's own title has room.
+    const std::optional<Image>& compactImage() const { return _compactImage; }
+    void setCompactImage(Image image);
     const std::shared_ptr<View>& customView() const { return _customView; }
     /// Never empty for an item that can be pressed: a standard symbol has its standard name.
     const std::string& accessibilityLabel() const { return _accessibilityLabel; }
@@ -62,7 +65,7 @@ private:
 
     SystemItem _systemItem = SystemItem::Plain;
     std::string _title, _accessibilityLabel;
-    std::optional<Image> _image;
+    std::optional<Image> _image, _compactImage;
     std::shared_ptr<View> _customView;
     Action _action;
     double _width = 8;

@@ -85,11 +85,11 @@ TEST_F(DocumentList, ShowsEveryKindOfItemWithItsDetails)
     drive.mark(drive.writeDocument("Stuff/Ours.txt", "abc"), mark::shared, "1");
     drive.writeLink("Stuff/Pointer", "Notes.txt");
     drive.makeFolder("Stuff/Letter.pages");
-    drive.writeDocument("Stuff/bad\xFFname");
+    drive.writeDocument("Stuff/bad\xFF\u202Egpj.exe");
     const RowOfKind rows[] = {
         {{"Trip", Kind::Folder}, localizedPlural(".DICT.ITEMS.%d", {2}), ui::DownloadState::Present,
             ui::RowAccessory::Disclosure},
-        {{"bad\xFFname"}, "7 bytes"},
+        {{"bad\xFF\u202Egpj.exe"}, "7 bytes"},
         {{"Far.pdf", Kind::Document, true}, "2 MB", ui::DownloadState::InCloud, ui::RowAccessory::None, 2},
         {{"Letter.pages", Kind::Package}, ""},
         {{"Notes.txt"}, "2 KB"},
@@ -113,7 +113,7 @@ TEST_F(DocumentList, ShowsEveryKindOfItemWithItsDetails)
         EXPECT_TRUE(shown.image.has_value());
         EXPECT_TRUE(isValidUtf8(shown.title));
     }
-    EXPECT_EQ(list->listView()->row(1).title, "bad\xEF\xBF\xBDname");
+    EXPECT_EQ(list->listView()->row(1).title, "bad\uFFFD\uFFFDgpj.exe");
     EXPECT_THAT(list->listView()->row(0).accessibleDescription,
         testing::AllOf(testing::StartsWith("Trip, Folder, "), HasSubstr(rows[0].detail)));
     EXPECT_THAT(list->listView()->row(2).accessibleDescription,
