@@ -40,6 +40,14 @@ bool isShiftHeld(GtkWidget* widget)
     return keyboard && (gdk_device_get_modifier_state(keyboard) & GDK_SHIFT_MASK) != 0;
 }
 
+/// A menu takes the pointer, so that the toolkit never sees the end of the press that opened it: the row
+/// would look pressed until the next one.
+void endPress(GtkWidget* pressed)
+{
+    for (auto* widget = pressed; widget; widget = gtk_widget_get_parent(widget))
+        gtk_widget_unset_state_flags(widget, GTK_STATE_FLAG_ACTIVE);
+}
+
 std::size_t rowCountBefore(const ui::ListView& list, const ui::ListChanges& changes)
 {
     std::size_t count = list.rowCount();
@@ -332,6 +340,7 @@ void ListViewPeer::showMenuOf(GtkWidget* row, double x, double y)
     // On the list rather than on the row, whose widget may be given to another row while the menu is open.
     double listX = x, listY = y;
     gtk_widget_translate_coordinates(row, widget(), x, y, &listX, &listY);
+    endPress(row);
     showMenu(widget(), listX, listY, list->menuForRow(ListRowWidget::position(row)));
 }
 
