@@ -338,6 +338,9 @@ TEST_F(FileChangesTest, WithoutPermissionAllStaysAsItIs)
 {
     makeFolder("closed/sub");
     const auto file = writeDocument("closed/sub/a.txt", "a"), folder = at("closed");
+    // In whatever order they are met: none may go before it is known that all can.
+    for (const auto& name : {"b", "c", "d", "e", "f", "g"})
+        writeDocument(std::string("closed/") + name, name);
     const auto before = everything(layout().documents());
     const auto sub = file.deletingLastPathComponent();
     const auto child = ::fork();

@@ -1,0 +1,168 @@
+#include "tests/sweep/support/SweepFixture.h"
+
+#include <gmock/gmock.h>
+
+#include <sys/syscall.h>
+
+#include <algorithm>
+#include <filesystem>
+
+namespace {
+
+namespace fs = std::filesystem;
+
+using sweep_tests::Drive;
+using sweep_tests::Fault;
+using sweep_tests::FileCall;
+
+constexpr const char* saved = "saved meanwhile";
+
+/// Another program works on the drive between two calls of the operation.
+class Meddling : public sweep_tests::SweepFixture {
+protected:
+    bool isRemoval() const { return GetParam().arguments[0] == "remove"; }
+    std::string item() const { return GetParam().arguments[1]; }
+    /// What a program may save meanwhile: the item, the document deepest inside it, or one in place of it.
+    std::string document() const
+    {
+        return at(item() == "folder" ? "folder/sub/b.txt" : item().substr(0, item().find('/')));
+    }
+    std::string target() const { return at(GetParam().arguments.back()); }
+
+    /// As editors do: beside the document, and then over its name. Answers whether it could.
+    static bool save(const std::string& path, const std::string& content = saved)
+    {
+        if (!fs::exists(fs::path(path).parent_path()))
+            return false;
+        write(path + '~', content);
+        std::error_code error;
+        fs::rename(path + '~', path, error);
+        return true;
+    }
+    /// A folder goes aside, and a link to a place outside the drive takes its name.
+    bool swap(const std::string& path) const
+    {
+        std::error_code error;
+        fs::rename(path, path + ".away", error);
+        if (!error)
+            fs::create_directory_symlink(_outside, path, error);
+        return !error;
+    }
+    void makeOutside() const
+    {
+        fs::remove_all(_outside);
+        fs::create_directories(_outside + "/sub");
+        for (const auto& name : {"/a.txt", "/b.txt", "/c.pdf", "/sub/b.txt"})
+            write(_outside + name, "precious");
+    }
+    std::size_t itemsOutside() const
+    {
+        return static_cast<std::size_t>(
+            std::distance(fs::recursive_directory_iterator(_outside), fs::recursive_directory_iterator()));
+    }
+    /// What the operation leaves in any case, but for a document that was saved over.
+    Drive lasting() const
+    {
+        makeDrive();
+        auto drive = seen();
+        if (isRemoval()) {
+            run([](const FileCall&) { return Fault{}; });
+            drive = seen();
+        }
+        drive.erase(document());
+        return drive;
+    }
+    /// Lets the deed be done before each call in turn, and asks afterwards; not where it could not be done.
+    void atEachCall(
+        const std::function<bool()>& deed, const std::function<void(const FileCall&)>& check) const
+    {
+        makeDrive();
+        const int calls = run([](const FileCall&) { return Fault{}; }).calls;
+        for (int point = 1; point <= calls; ++point) {
+            makeDrive();
+            bool isDone = false;
+            FileCall met;
+            run([&](const FileCall& call) {
+                if (call.index == point) {
+                    met = call;
+                    isDone = deed();
+                }
+                return Fault{};
+            });
+            startAgain();
+            SCOPED_TRACE("at call " + std::to_string(point) + ", " + std::to_string(met.number) + " on "
+                + met.subject);
+            if (isDone)
+                check(met);
+        }
+    }
+
+private:
+    const std::string _outside = _folder.at("outside");
+};
+
+class MeddlingWithMoves : public Meddling { };
+class MeddlingWithFolders : public Meddling { };
+
+TEST_P(Meddling, WhatIsSavedMeanwhileIsKept)
+{
+    const auto stays = lasting();
+    // What came before the removal looked at its item goes with it; what comes later does not.
+    bool isSeen = !isRemoval();
+    atEachCall([&] { return save(document()); },
+        [&](const FileCall& call) {
+            const bool isKept = isAllThere({{document(), saved}});
+            isSeen = isSeen || isKept || call.number == SYS_renameat2;
+            EXPECT_TRUE(isKept || !isSeen);
+            EXPECT_TRUE(isAllThere(stays));
+        });
+    EXPECT_TRUE(isSeen);
+}
+
+TEST_P(MeddlingWithMoves, ADocumentUnderTheNewNameIsNeverReplaced)
+{
+    makeDrive();
+    auto all = seen();
+    all[target()] = saved;
+    atEachCall([&] { return !fs::exists(target()) && save(target()); },
+        [&](const FileCall&) { EXPECT_TRUE(isAllThere(all)); });
+}
+
+TEST_P(MeddlingWithMoves, TheCopyIsAsGoodAsTheOriginalOnceBothWereChanged)
+{
+    const Drive both{{document(), saved}, {target(), "saved there"}};
+    atEachCall(
+        [&] { return fs::is_regular_file(target()) && save(target(), "saved there") && save(document()); },
+        [&](const FileCall&) { EXPECT_TRUE(isAllThere(both)); });
+}
+
+TEST_P(MeddlingWithFolders, ALinkInPlaceOfAFolderLeadsNowhere)
+{
+    makeOutside();
+    const auto items = itemsOutside();
+    const auto& folder = item() == "folder" ? "folder/sub" : "target";
+    atEachCall([&] { return swap(at(folder)); }, [&](const FileCall&) { EXPECT_EQ(itemsOutside(), items); });
+}
+
+std::string nameOf(const testing::TestParamInfo<sweep_tests::Operation>& row)
+{
+    return row.param.name;
+}
+
+std::vector<sweep_tests::Operation> operationsWith(const std::string& argument)
+{
+    auto all = sweep_tests::operations();
+    std::erase_if(all, [&](const auto& operation) {
+        return std::ranges::find(operation.arguments, argument) == operation.arguments.end();
+    });
+    return all;
+}
+
+INSTANTIATE_TEST_SUITE_P(Operations, Meddling, testing::ValuesIn(sweep_tests::operations()), nameOf);
+INSTANTIATE_TEST_SUITE_P(Operations, MeddlingWithMoves, testing::ValuesIn(operationsWith("move")), nameOf);
+
+INSTANTIATE_TEST_SUITE_P(
+    IntoFolders, MeddlingWithFolders, testing::ValuesIn(operationsWith("target/new.txt")), nameOf);
+INSTANTIATE_TEST_SUITE_P(OfFolders, MeddlingWithFolders, testing::ValuesIn(operationsWith("folder")), nameOf);
+
+} // namespace

@@ -1,0 +1,188 @@
+#include "tests/sweep/support/SweepFixture.h"
+
+#include "host/drive/LocalCloudStore.h"
+#include "host/drive/PromiseRecord.h"
+#include "host/drive/Recovery.h"
+
+#include <sys/syscall.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <filesystem>
+#include <fstream>
+#include <ostream>
+
+namespace sweep_tests {
+
+namespace fs = std::filesystem;
+
+using host::drive::PromiseRecord;
+
+void PrintTo(const Operation& operation, std::ostream* stream)
+{
+    *stream << operation.name;
+}
+
+std::vector<Operation> operations()
+{
+    return {{"mkdir", {"mkdir", "new/one/two"}}, {"removeFile", {"remove", "file.txt"}},
+        {"removeFolder", {"remove", "folder"}}, {"removePromise", {"remove", "p.txt"}},
+        {"removeTwin", {"remove", "twin.txt"}}, {"moveFile", {"move", "file.txt", "target/new.txt"}},
+        {"moveFolder", {"move", "folder", "target/new"}},
+        {"movePromise", {"move", "p.txt", "target/new.txt"}},
+        {"moveFileAcross", {"move", "file.txt", "target/new.txt"}, FileSystems::Several},
+        {"moveFolderAcross", {"move", "folder", "target/new"}, FileSystems::Several},
+        {"movePromiseAcross", {"move", "p.txt", "target/new.txt"}, FileSystems::Several},
+        {"evict", {"evict", "file.txt"}}};
+}
+
+void SweepFixture::makeDrive() const
+{
+    fs::remove_all(_layout.home());
+    for (const auto& folder : {"folder/sub", "folder/empty", "target"})
+        fs::create_directories(at(folder));
+    fs::create_directories(_layout.cloud());
+    write(at("file.txt"), std::string(100'000, 'f'));
+    write(at("folder/a.txt"), "a");
+    write(at("folder/sub/b.txt"), "bb");
+    fs::create_symlink("../a.txt", at("folder/sub/link"));
+    promise("folder/sub/c.pdf", "ccc");
+    promise("p.txt", "pppp");
+    write(at("twin.txt"), "of the document");
+    promise("twin.txt", "that nobody has seen");
+    promise("bystander.pdf", "kept");
+}
+
+Ending SweepFixture::run(const std::function<Fault(const FileCall&)>& faultFor) const
+{
+    std::vector<std::string> command{TARROW_FILES_COMMAND};
+    command.insert(command.end(), GetParam().arguments.begin(), GetParam().arguments.end());
+    return runWithFaults(command, _layout.home() + '/', [&](const FileCall& call) {
+        const auto fault = faultFor(call);
+        return fault.kind == Fault::Kind::None && isForOtherFileSystem(call)
+            ? Fault{Fault::Kind::Error, EXDEV}
+            : fault;
+    });
+}
+
+void SweepFixture::startAgain() const
+{
+    host::drive::LocalCloudStore store(_layout);
+    host::drive::Recovery(_layout, store).run();
+}
+
+Drive SweepFixture::seen() const
+{
+    Drive drive;
+    for (auto each = fs::recursive_directory_iterator(_layout.documents());
+         each != fs::recursive_directory_iterator(); ++each) {
+        const auto path = each->path().string();
+        if (const auto item = PromiseRecord::itemPathFor(path))
+            drive["promise of " + *item] = behind(path);
+        else if (each->path().filename().string().starts_with(".trw"))
+            each.disable_recursion_pending();
+        else
+            drive[path] = each->is_symlink() ? "link to " + fs::read_symlink(path).string()
+                : each->is_directory()       ? "folder"
+                                             : read(path);
+    }
+    return drive;
+}
+
+std::vector<std::string> SweepFixture::leftovers() const
+{
+    std::vector<std::string> found;
+    std::size_t contents = 0;
+    for (const auto& entry : fs::recursive_directory_iterator(_layout.home())) {
+        const auto path = entry.path().string();
+        const auto name = entry.path().filename().string();
+        if (path.starts_with(_layout.cloud() + '/'))
+            ++contents;
+        else if (name.starts_with(".trw") || path.starts_with(_layout.held() + '/')
+            || path.starts_with(_layout.trash() + '/'))
+            found.push_back(path);
+    }
+    for (const auto& [path, content] : seen()) {
+        if (path.starts_with("promise of ") && content != "nothing")
+            --contents;
+    }
+    if (contents != 0)
+        found.push_back("contents without a promise: " + std::to_string(contents));
+    return found;
+}
+
+bool SweepFixture::isAllThere(const Drive& drive) const
+{
+    std::vector<std::string> contents;
+    for (const auto& entry : fs::recursive_directory_iterator(_layout.home())) {
+        if (entry.is_regular_file() && !entry.is_symlink())
+            contents.push_back(read(entry.path().string()));
+    }
+    return std::ranges::all_of(drive, [&](const auto& item) {
+        return item.second == "folder" || item.second.starts_with("link to ")
+            || std::ranges::find(contents, item.second) != contents.end();
+    });
+}
+
+bool SweepFixture::isNothingHalf(const Drive& now, const Drive& before)
+{
+    return std::ranges::all_of(now, [&](const auto& item) {
+        return item.second == "folder" || item.second == "nothing"
+            || std::ranges::any_of(before, [&](const auto& old) { return old.second == item.second; });
+    });
+}
+
+std::string SweepFixture::differences(const Drive& now, const Drive& before)
+{
+    std::string text;
+    const auto add = [&](const char* what, const Drive& some, const Drive& others) {
+        for (const auto& item : some) {
+            if (const auto other = others.find(item.first); other == others.end() || *other != item)
+                text += what + item.first + ": " + item.second.substr(0, 20);
+        }
+    };
+    add("\n  is now ", now, before);
+    add("\n  was ", before, now);
+    return text;
+}
+
+bool SweepFixture::isForOtherFileSystem(const FileCall& call) const
+{
+    const auto folderOf = [](const std::string& path) { return path.substr(0, path.rfind('/')); };
+    const auto isPrivate = [](const std::string& path) {
+        return path.substr(path.rfind('/') + 1).starts_with(".trw");
+    };
+    return GetParam().fileSystems == FileSystems::Several && call.number == SYS_renameat2
+        && folderOf(call.subject) != folderOf(call.newName) && !isPrivate(call.subject)
+        && !isPrivate(call.newName);
+}
+
+void SweepFixture::write(const std::string& path, const std::string& content)
+{
+    std::ofstream(path, std::ios::binary) << content;
+}
+
+std::string SweepFixture::read(const std::string& path)
+{
+    std::ifstream file(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(file), {}};
+}
+
+void SweepFixture::promise(const std::string& path, const std::string& content) const
+{
+    PromiseRecord record;
+    record.content = "content of " + fs::path(path).filename().string();
+    record.size = content.size();
+    record.modified = platform::Date{1'600'000'000'000'000'000};
+    write(_layout.cloud() + '/' + record.content, content);
+    write(PromiseRecord::pathFor(at(path)), record.toJson());
+}
+
+std::string SweepFixture::behind(const std::string& promisePath) const
+{
+    const auto record = PromiseRecord::parse(read(promisePath));
+    const auto content = _layout.cloud() + '/' + (record ? record->content : std::string("damaged"));
+    return fs::exists(content) ? read(content) : "nothing";
+}
+
+} // namespace sweep_tests

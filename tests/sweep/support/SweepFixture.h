@@ -1,0 +1,68 @@
+#pragma once
+
+#include "host/drive/DriveLayout.h"
+#include "tests/support/TemporaryDirectory.h"
+#include "tests/sweep/support/FaultyRun.h"
+
+#include <gtest/gtest.h>
+
+#include <iosfwd>
+#include <map>
+#include <string>
+#include <vector>
+
+namespace sweep_tests {
+
+/// Whether documents can be renamed from folder to folder.
+enum class FileSystems { One, Several };
+
+struct Operation {
+    const char* name;
+    std::vector<std::string> arguments;
+    FileSystems fileSystems = FileSystems::One;
+};
+
+void PrintTo(const Operation& operation, std::ostream* stream);
+
+/// All that change the drive.
+std::vector<Operation> operations();
+
+/// What a user sees: every item by its path, a document with its content, a promise with the content behind
+/// it.
+using Drive = std::map<std::string, std::string>;
+
+/// A small drive with every kind of item, on which an operation runs.
+class SweepFixture : public testing::TestWithParam<Operation> {
+protected:
+    SweepFixture() { ::setenv("TARROW_DRIVE_HOME", _layout.home().c_str(), 1); }
+    ~SweepFixture() override { ::unsetenv("TARROW_DRIVE_HOME"); }
+
+    void makeDrive() const;
+    std::string at(const std::string& path) const { return _layout.defaultContainer() + '/' + path; }
+
+    /// Runs the operation and lets one of its calls meet a fault; none for call 0.
+    Ending run(const std::function<Fault(const FileCall&)>& faultFor) const;
+    /// What any program does when it starts on the drive.
+    void startAgain() const;
+
+    Drive seen() const;
+    /// What should not be there once nobody works on the drive.
+    std::vector<std::string> leftovers() const;
+    /// Every content of a drive lies somewhere, under whatever name.
+    bool isAllThere(const Drive& drive) const;
+    /// No name shows anything but what was under some name before.
+    static bool isNothingHalf(const Drive& now, const Drive& before);
+    static std::string differences(const Drive& now, const Drive& before);
+    static void write(const std::string& path, const std::string& content);
+
+    const testing_support::TemporaryDirectory _folder;
+    const host::drive::DriveLayout _layout = host::drive::DriveLayout::at(_folder.at("drive")).prepare();
+
+private:
+    bool isForOtherFileSystem(const FileCall& call) const;
+    static std::string read(const std::string& path);
+    void promise(const std::string& path, const std::string& content) const;
+    std::string behind(const std::string& promisePath) const;
+};
+
+} // namespace sweep_tests
