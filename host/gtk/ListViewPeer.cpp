@@ -23,6 +23,8 @@ constexpr std::size_t firstRows = 6, moreRows = 6;
 constexpr std::size_t seenMargin = 2;
 /// The widgets take so many single changes at once; more are told in one away from what is seen.
 constexpr std::size_t mostSplices = 16;
+constexpr double textMargin =
+    10; ///< points above and below a row's texts, half the distance between them included
 constexpr double markDragStart = 8; ///< points; a finger that only taps moves less
 constexpr int layoutFrames = 2; ///< after so many frames new rows have their heights
 constexpr int focusFrames = 4; ///< a row that was scrolled to has its widget after one or two
@@ -38,6 +40,14 @@ bool isShiftHeld(GtkWidget* widget)
     auto* seat = gdk_display_get_default_seat(gtk_widget_get_display(widget));
     auto* keyboard = seat ? gdk_seat_get_keyboard(seat) : nullptr;
     return keyboard && (gdk_device_get_modifier_state(keyboard) & GDK_SHIFT_MASK) != 0;
+}
+
+/// What two lines of text and the margins around them need, which with large text is more than the usual.
+double rowHeightForTexts()
+{
+    const double lines = ui::Font::preferred(ui::TextStyle::Body).lineHeight()
+        + ui::Font::preferred(ui::TextStyle::Footnote).lineHeight();
+    return std::max(ui::ListView::defaultRowHeight, std::ceil(lines + 2 * textMargin));
 }
 
 /// A menu takes the pointer, so that the toolkit never sees the end of the press that opened it: the row
@@ -371,6 +381,8 @@ void ListViewPeer::mirror(ui::View& shown, ui::ViewChanges changes)
     const auto list = _list.lock();
     if (!list || !changes.contains(ui::ViewChange::Content))
         return;
+    if (const double height = rowHeightForTexts(); height != list->rowHeight())
+        list->setRowHeight(height);
     list->setScrollObserver(observing<ui::ScrollObserver>(*this));
     list->setListObserver(observing<ui::ListViewObserver>(*this));
     showRows(list->rowCount());

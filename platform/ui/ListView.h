@@ -16,7 +16,7 @@ class ListView : public ScrollView {
 public:
     using ScrollView::ScrollView;
 
-    static constexpr double defaultRowHeight = 60; ///< points
+    static constexpr double defaultRowHeight = 64; ///< points
     static constexpr double minimumRowHeight = 48; ///< points; smaller is no target for a finger
 
     void accept(ViewVisitor& visitor) override;
