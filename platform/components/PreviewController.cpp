@@ -130,6 +130,8 @@ void PreviewController::didMoveToParentViewController(const std::shared_ptr<View
     ViewController::didMoveToParentViewController(parent);
     if (!parent)
         close();
+    else if (_screen)
+        showToolbar();
 }
 
 /// Ends all work, and keeps nothing of the document but where it is.
@@ -250,11 +252,19 @@ void PreviewController::showPreview(const std::shared_ptr<PreviewView>& preview)
     connectPreview();
 }
 
+/// A preview that another screen holds in miniature is only looked at.
+void PreviewController::showToolbar()
+{
+    const bool isMiniature = parent() && !navigationController();
+    _screen->toolbar()->setHidden(isMiniature || _screen->toolbar()->isEmpty());
+    _screen->setNeedsLayout();
+}
+
 void PreviewController::connectPreview()
 {
     const auto shown = _screen->content() == _previewView ? _previewView : nullptr;
     _screen->toolbar()->setPreview(shown);
-    _screen->toolbar()->setHidden(_screen->toolbar()->isEmpty());
+    showToolbar();
     _screen->searchBar()->setPreview(shown);
     _screen->setNeedsLayout();
     if (!shown)

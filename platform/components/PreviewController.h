@@ -93,6 +93,7 @@ private:
     void forgetContent();
     void close();
     void connectPreview();
+    void showToolbar();
     void previewFailed(const std::string& words);
     std::shared_ptr<const PreviewContent> withoutPlayer(std::shared_ptr<const PreviewContent> content) const;
     std::shared_ptr<PreviewController> self();
