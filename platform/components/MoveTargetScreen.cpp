@@ -144,7 +144,9 @@ void MoveTargetScreen::showState(const std::optional<Error>& error)
     else
         _placeholder->setContent({.iconName = "folder-open-symbolic",
             .title = localized("No folders here"),
-            .message = localized("Move the items into this folder, or make a new folder for them.")});
+            .message = _moveButton->isEnabled()
+                ? localized("Move the items into this folder, or make a new folder for them.")
+                : localized("Make a new folder for the items, or go back to another one.")});
 }
 
 void MoveTargetScreen::findRecents()
