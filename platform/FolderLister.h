@@ -31,8 +31,9 @@ public:
 
     /// Starts to list a folder, and the extra items with it. `update` is called on the main queue: perhaps
     /// once with the first rows, then with the complete list (or with the failure), and again with the
-    /// complete list whenever the folder's items changed, never more than once for what one turn of the main
-    /// loop brings. Main thread.
+    /// complete list whenever the folder's items or their contents changed: usually a revision of the list
+    /// that was delivered before. Never more than once for what one turn of the main loop brings. Main
+    /// thread.
     virtual std::shared_ptr<FolderListing> list(const Url& folder,
         std::vector<FolderSnapshot::ExtraItem> extraItems, FolderGrouping grouping, Update update) = 0;
 };

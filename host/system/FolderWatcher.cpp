@@ -1,37 +1,45 @@
 #include "host/system/FolderWatcher.h"
 
+#include <sys/inotify.h>
+
 #include <mutex>
 
 namespace host::system {
 
-struct FolderWatcher::State {
-    Handler changed;
+struct FolderWatcher::State : std::enable_shared_from_this<State> {
+    Handler changed, written;
     std::unique_ptr<Inotify> inotify;
     std::mutex mutex;
     int watch = -1;
 
     void tell()
     {
-        std::vector<std::string> names;
+        std::vector<std::string> names, namesWritten;
         {
             const std::lock_guard lock(mutex);
             for (auto& event : inotify->take()) {
                 // What is left of a former folder's events concerns nobody.
                 if (event.watch != watch && event.watch >= 0)
                     continue;
-                names.push_back(event.isLoss() ? std::string() : std::move(event.name));
+                auto& told = event.mask == IN_MODIFY ? namesWritten : names;
+                told.push_back(event.isLoss() ? std::string() : std::move(event.name));
             }
         }
+        const auto keepsHandlers = shared_from_this();
         if (!names.empty())
             changed(names);
+        if (!namesWritten.empty())
+            written(namesWritten);
     }
 };
 
-FolderWatcher::FolderWatcher(Handler changed)
+FolderWatcher::FolderWatcher(Handler changed, Handler written)
     : _state(std::make_shared<State>())
 {
+    const auto writing = written ? Inotify::Writing::AtOnce : Inotify::Writing::WhenClosed;
     _state->changed = std::move(changed);
-    _state->inotify = std::make_unique<Inotify>(Inotify::Writing::WhenClosed, [weak = std::weak_ptr(_state)] {
+    _state->written = std::move(written);
+    _state->inotify = std::make_unique<Inotify>(writing, [weak = std::weak_ptr(_state)] {
         if (const auto state = weak.lock())
             state->tell();
     });

@@ -19,7 +19,9 @@ public:
     /// folder itself went away. It may end the watcher.
     using Handler = std::function<void(const std::vector<std::string>& names)>;
 
-    explicit FolderWatcher(Handler changed);
+    /// `written` is called, in the same way, with the names of files whose content changes while they are
+    /// open, perhaps without end; without it they are told of when they are closed.
+    explicit FolderWatcher(Handler changed, Handler written = {});
     FolderWatcher(const FolderWatcher&) = delete;
     FolderWatcher& operator=(const FolderWatcher&) = delete;
 

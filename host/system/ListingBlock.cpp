@@ -38,17 +38,31 @@ FolderEntry ListingBlock::entry(std::size_t number) const
     return {std::string_view(_names).substr(entry.nameOffset, entry.nameLength), entry.kind, entry.isPromise};
 }
 
+void ListingBlock::appendKey(const FolderEntry& entry, const NameOrder& order,
+    platform::FolderGrouping grouping, std::vector<std::uint8_t>& keys)
+{
+    const bool isFolder = entry.kind == FolderEntryKind::Folder || entry.kind == FolderEntryKind::Library;
+    // What is grouped comes first, whatever its name.
+    keys.push_back(isFolder && grouping == platform::FolderGrouping::FoldersFirst ? 0 : 1);
+    order.appendKey(entry.name, keys);
+}
+
+bool ListingBlock::isAfter(
+    const FolderEntry& other, std::span<const std::uint8_t> key, std::size_t place) const
+{
+    const auto& rank = _ranks[place];
+    const auto own = std::span(_keys).subspan(rank.keyOffset, rank.keyLength);
+    const auto order = std::lexicographical_compare_three_way(key.begin(), key.end(), own.begin(), own.end());
+    return order == 0 ? other.name < entry(rank.number).name : order < 0;
+}
+
 void ListingBlock::sort(const NameOrder& order, platform::FolderGrouping grouping)
 {
     _keys.reserve(_names.size() * 2 + 1024);
     _ranks.reserve(_entries.size());
     for (std::size_t number = 0; number < _entries.size(); ++number) {
-        const auto kind = _entries[number].kind;
         const auto begin = _keys.size();
-        const bool isFolder = kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
-        // What is grouped comes first, whatever its name.
-        _keys.push_back(isFolder && grouping == platform::FolderGrouping::FoldersFirst ? 0 : 1);
-        order.appendKey(entry(number).name, _keys);
+        appendKey(entry(number), order, grouping, _keys);
         _ranks.push_back(makeRank(number, begin));
     }
     std::ranges::sort(_ranks, [this](const Rank& a, const Rank& b) { return compare(a, *this, b) < 0; });

@@ -4,6 +4,7 @@
 
 #include <compare>
 #include <cstdint>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -20,6 +21,9 @@ public:
     std::size_t count() const { return _entries.size(); }
     std::size_t nameBytes() const { return _names.size(); }
 
+    /// Appends what entries of a list are compared by, before their names as bytes.
+    static void appendKey(const platform::FolderEntry& entry, const NameOrder& order,
+        platform::FolderGrouping grouping, std::vector<std::uint8_t>& keys);
     /// Sorts the block. Entries keep their numbers; rank() tells their places.
     void sort(const NameOrder& order, platform::FolderGrouping grouping);
 
@@ -34,6 +38,9 @@ public:
     {
         return compare(_ranks[place], other, other._ranks[otherPlace]) < 0;
     }
+    /// Whether an entry of a list, by its key, comes before the one at a place.
+    bool isAfter(
+        const platform::FolderEntry& other, std::span<const std::uint8_t> key, std::size_t place) const;
 
 private:
     struct Entry {

@@ -179,6 +179,9 @@ void DocumentListController::viewDidAppear(bool animated)
     ui::ViewController::viewDidAppear(animated);
     _hasTakenKeyboard = false;
     takeKeyboard();
+    // The folders in it may hold something else since they were looked at.
+    _rows->invalidateDetails(std::vector<ui::RowId>());
+    _rows->visibleRowsDidChange();
     // The delegate takes the list off the stack, which must not happen while the stack is still moving.
     if (_wasRemoved)
         services().dispatch().mainQueue()->async([weak = std::weak_ptr(self())] {
@@ -193,7 +196,7 @@ void DocumentListController::contentsDidChange(const FolderContentsUpdate& updat
     _state = update.stage;
     _failure = update.error;
     _rows->setRows(update.rows);
-    _rows->invalidateDetails();
+    _rows->invalidateDetails(update.touched);
     if (std::exchange(_isReordered, false)) {
         // Nearly every row has moved: one begins at the top again.
         _hasTakenKeyboard = false;

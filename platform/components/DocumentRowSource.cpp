@@ -214,11 +214,17 @@ void DocumentRowSource::thumbnailArrived(ui::RowId id, std::optional<Image> thum
         tellIfVisible(id);
 }
 
-void DocumentRowSource::invalidateDetails()
+void DocumentRowSource::invalidateDetails(const std::optional<std::vector<ui::RowId>>& rows)
 {
     for (auto& [id, known] : _known)
-        known.isStale = true;
-    _loader->cancelAll();
+        known.isStale = known.isStale || !rows || known.details.isContainer;
+    if (!rows)
+        return _loader->cancelAll();
+    for (const auto id : *rows) {
+        if (const auto known = _known.find(id); known != _known.end())
+            known->second.isStale = true;
+        _loader->cancel(id);
+    }
 }
 
 void DocumentRowSource::detailsArrived(ui::RowId id, RowDetails details)

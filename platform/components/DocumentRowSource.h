@@ -43,9 +43,9 @@ public:
 
     /// Fetches what is missing for the visible rows.
     void visibleRowsDidChange();
-    /// The items may have changed: known details stay on the screen until the next `visibleRowsDidChange` has
-    /// read them again.
-    void invalidateDetails();
+    /// Items may have changed, or with nothing all: known details stay on the screen until the next
+    /// `visibleRowsDidChange` has read them again. What folders hold may always have changed.
+    void invalidateDetails(const std::optional<std::vector<ui::RowId>>& rows = std::nullopt);
 
     std::size_t numberOfRows(const ui::ListView& list) const override;
     ui::ListRow rowAtIndex(const ui::ListView& list, std::size_t index) const override;

@@ -2,8 +2,10 @@
 
 #include <algorithm>
 #include <functional>
+#include <limits>
 #include <string>
 #include <unordered_map>
+#include <utility>
 
 namespace platform::components {
 
@@ -40,52 +42,119 @@ std::unordered_map<ui::RowId, unsigned> appearances(const DocumentRows& rows)
     return found;
 }
 
+std::vector<ui::RowRange> rangesOf(const SnapshotOrder::Indexes& rows)
+{
+    std::vector<ui::RowRange> ranges;
+    for (const auto row : rows) {
+        if (!ranges.empty() && ranges.back().end() == row)
+            ++ranges.back().count;
+        else
+            ranges.push_back({row, 1});
+    }
+    return ranges;
+}
+
 std::vector<ui::RowRange> rowsOfOtherAppearance(const DocumentRows& before, const DocumentRows& after)
 {
-    std::vector<ui::RowRange> changed;
+    SnapshotOrder::Indexes changed;
     const auto known = appearances(before);
     for (std::size_t row = 0; row < after.count(); ++row) {
         const auto found = known.find(after.ids()[row]);
-        if (found == known.end() || found->second == appearance(after.entry(row)))
-            continue;
-        if (!changed.empty() && changed.back().end() == row)
-            ++changed.back().count;
-        else
-            changed.push_back({row, 1});
+        if (found != known.end() && found->second != appearance(after.entry(row)))
+            changed.push_back(static_cast<std::uint32_t>(row));
     }
-    return changed;
+    return rangesOf(changed);
+}
+
+/// The splices that take rows away and put others in.
+std::vector<ui::ListSplice> splicesOf(const SnapshotOrder::Step& step)
+{
+    std::vector<ui::ListSplice> splices;
+    auto goes = step.removed.begin();
+    auto comes = step.inserted.begin();
+    std::size_t before = 0, after = 0;
+    constexpr auto never = std::numeric_limits<std::size_t>::max();
+    while (goes != step.removed.end() || comes != step.inserted.end()) {
+        const auto untilGoing = goes == step.removed.end() ? never : *goes - before;
+        const auto untilComing = comes == step.inserted.end() ? never : *comes - after;
+        const auto kept = std::min(untilGoing, untilComing);
+        before += kept;
+        after += kept;
+        ui::ListSplice splice{after, 0, 0};
+        for (; goes != step.removed.end() && *goes == before; ++goes, ++before)
+            ++splice.removed;
+        for (; comes != step.inserted.end() && *comes == after; ++comes, ++after)
+            ++splice.inserted;
+        splices.push_back(splice);
+    }
+    return splices;
 }
 
 } // namespace
 
+DocumentRows::DocumentRows(std::shared_ptr<const FolderSnapshot> snapshot, SnapshotOrder order)
+    : _snapshot(std::move(snapshot))
+    , _order(std::move(order))
+{
+    _ids.reserve(_snapshot->count());
+}
+
 std::shared_ptr<const DocumentRows> DocumentRows::make(
     std::shared_ptr<const FolderSnapshot> snapshot, const ListOrder& order)
 {
-    const std::shared_ptr<DocumentRows> rows(new DocumentRows(std::move(snapshot)));
-    rows->_ids.reserve(rows->_snapshot->count());
-    for (std::size_t i = 0; i < rows->_snapshot->count(); ++i)
-        rows->append(i);
-    if (!order.isListersOwn())
-        rows->sort(order);
+    SnapshotOrder places(*snapshot, order);
+    const std::shared_ptr<DocumentRows> rows(new DocumentRows(std::move(snapshot), std::move(places)));
+    for (std::size_t row = 0; row < rows->_snapshot->count(); ++row) {
+        auto id = rows->idAt(row);
+        // For a moment a document may stand beside its own promise: same name, neighbours in the order.
+        if (row > 0 && rows->_ids.back() == id)
+            ++id;
+        rows->_ids.push_back(id);
+    }
     return rows;
 }
 
-void DocumentRows::sort(const ListOrder& order)
+ui::RowId DocumentRows::idAt(std::size_t row) const
 {
-    _indexes = orderedIndexes(*_snapshot, order);
-    const auto ids = _ids;
-    for (std::size_t row = 0; row < _indexes.size(); ++row)
-        _ids[row] = ids[_indexes[row]];
+    const auto* extra = extraItem(row);
+    return extra ? idOfExtraItem(extra->url) : idOfName(entry(row).name);
 }
 
-void DocumentRows::append(std::size_t snapshotIndex)
+RowsStep DocumentRows::step(
+    const DocumentRows& before, std::shared_ptr<const FolderSnapshot> snapshot, const ListOrder& order)
 {
-    const auto* extra = _snapshot->extraItem(snapshotIndex);
-    auto id = extra ? idOfExtraItem(extra->url) : idOfName(_snapshot->entry(snapshotIndex).name);
-    // For a moment a document may stand beside its own promise: same name, neighbours in the order.
-    if (!_ids.empty() && _ids.back() == id)
-        ++id;
-    _ids.push_back(id);
+    const bool isRevision = snapshot->revision() && snapshot->revision()->before.lock() == before._snapshot;
+    if (isRevision && before._order.order() == order) {
+        if (auto step = revised(before, snapshot))
+            return std::move(*step);
+    }
+    const auto rows = make(std::move(snapshot), order);
+    return {rows, changes(before, *rows), std::nullopt};
+}
+
+std::optional<RowsStep> DocumentRows::revised(
+    const DocumentRows& before, const std::shared_ptr<const FolderSnapshot>& snapshot)
+{
+    SnapshotOrder::Step step;
+    auto order = before._order.revised(*snapshot, step);
+    if (!order)
+        return std::nullopt;
+    const std::shared_ptr<DocumentRows> rows(new DocumentRows(snapshot, std::move(*order)));
+    RowsStep made{rows, {splicesOf(step), rangesOf(step.touched)}, std::vector<ui::RowId>()};
+    auto from = before._ids.begin();
+    for (const auto& splice : made.changes.splices) {
+        const auto kept = static_cast<std::ptrdiff_t>(splice.position - rows->_ids.size());
+        rows->_ids.insert(rows->_ids.end(), from, from + kept);
+        from += kept + static_cast<std::ptrdiff_t>(splice.removed);
+        for (std::size_t i = 0; i < splice.inserted; ++i)
+            rows->_ids.push_back(rows->idAt(rows->_ids.size()));
+    }
+    rows->_ids.insert(rows->_ids.end(), from, before._ids.end());
+    for (const auto* touched : {&step.inserted, &step.touched}) {
+        for (const auto row : *touched)
+            made.touched->push_back(rows->_ids[row]);
+    }
+    return made;
 }
 
 ui::RowId DocumentRows::idFor(const Url& url) const

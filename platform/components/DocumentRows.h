@@ -2,7 +2,7 @@
 
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
-#include "platform/components/ListOrder.h"
+#include "platform/components/SnapshotOrder.h"
 #include "platform/ui/ListChanges.h"
 
 #include <cstdint>
@@ -14,8 +14,18 @@
 
 namespace platform::components {
 
+class DocumentRows;
+
+/// A new state of a list's rows, and the way to it from the state before.
+struct RowsStep {
+    std::shared_ptr<const DocumentRows> rows;
+    ui::ListChanges changes;
+    /// The rows whose items may have other details now; nothing: all may.
+    std::optional<std::vector<ui::RowId>> touched;
+};
+
 /// The rows that a folder list shows: the items of one snapshot in some order, with the identifiers of their
-/// rows. Immutable; any thread. To make one takes a pass over all names, and what orderedIndexes() takes.
+/// rows. Immutable; any thread. To make one takes a pass over all names, and what a SnapshotOrder takes.
 class DocumentRows {
 public:
     static std::shared_ptr<const DocumentRows> make(
@@ -32,6 +42,11 @@ public:
     }
     const std::shared_ptr<const FolderSnapshot>& snapshot() const { return _snapshot; }
 
+    /// The rows of the list's next snapshot. When it is a revision of the one before, in the same order, only
+    /// what it names costs more than a copy.
+    static RowsStep step(
+        const DocumentRows& before, std::shared_ptr<const FolderSnapshot> snapshot, const ListOrder& order);
+
     /// The identifier that the row of an item has, whether it is there or not.
     ui::RowId idFor(const Url& url) const;
 
@@ -44,17 +59,15 @@ public:
     static ui::ListChanges changes(const DocumentRows& before, const DocumentRows& after);
 
 private:
-    explicit DocumentRows(std::shared_ptr<const FolderSnapshot> snapshot)
-        : _snapshot(std::move(snapshot))
-    {
-    }
-    std::size_t snapshotIndex(std::size_t row) const { return _indexes.empty() ? row : _indexes[row]; }
-    void append(std::size_t snapshotIndex);
-    void sort(const ListOrder& order);
+    DocumentRows(std::shared_ptr<const FolderSnapshot> snapshot, SnapshotOrder order);
+    static std::optional<RowsStep> revised(
+        const DocumentRows& before, const std::shared_ptr<const FolderSnapshot>& snapshot);
+    std::size_t snapshotIndex(std::size_t row) const { return _order.index(row); }
+    ui::RowId idAt(std::size_t row) const;
 
     std::shared_ptr<const FolderSnapshot> _snapshot;
+    SnapshotOrder _order;
     std::vector<ui::RowId> _ids;
-    std::vector<std::uint32_t> _indexes; ///< of the rows in the snapshot; empty: in its order
 };
 
 } // namespace platform::components

@@ -9,13 +9,13 @@ namespace platform::components {
 
 namespace {
 
+/// Of so many revisions that wait the last alone says it sooner.
+constexpr std::size_t mostWaiting = 8;
+
 FolderContentsUpdate updateBetween(
-    const DocumentRows& before, std::shared_ptr<const FolderSnapshot> snapshot, const ListOrder& order)
+    const DocumentRows& before, const std::shared_ptr<const FolderSnapshot>& snapshot, const ListOrder& order)
 {
-    const auto stage = snapshot->stage();
-    const auto error = snapshot->error();
-    const auto after = DocumentRows::make(std::move(snapshot), order);
-    return {after, DocumentRows::changes(before, *after), stage, error};
+    return {DocumentRows::step(before, snapshot, order), snapshot->stage(), snapshot->error()};
 }
 
 } // namespace
@@ -36,6 +36,7 @@ FolderContents::FolderContents(Url folder, Update update)
 void FolderContents::start(std::vector<FolderSnapshot::ExtraItem> extraItems, const ListOrder& order)
 {
     _order = order;
+    _waiting.clear();
     _listing = services().folderLister().list(
         _folder, std::move(extraItems), order.grouping, [weak = weak_from_this()](Snapshot snapshot) {
             if (const auto self = weak.lock())
@@ -51,9 +52,17 @@ void FolderContents::snapshotArrived(Snapshot snapshot)
     if (isBeginning && (_rows->count() >= snapshot->count() || !_order.isListersOwn()))
         return;
     if (_isWorking)
-        _waiting = std::move(snapshot);
+        wait(std::move(snapshot));
     else
         workOut(std::move(snapshot));
+}
+
+void FolderContents::wait(Snapshot snapshot)
+{
+    // A list that was read whole needs none of those before it; a revision is understood after them only.
+    if (!snapshot->revision() || _waiting.size() >= mostWaiting)
+        _waiting.clear();
+    _waiting.push_back(std::move(snapshot));
 }
 
 void FolderContents::workOut(Snapshot snapshot)
@@ -77,8 +86,11 @@ void FolderContents::workOutInBackground(Snapshot snapshot)
                 return;
             self->_isWorking = false;
             self->adopt(*update);
-            if (const auto next = std::exchange(self->_waiting, nullptr))
-                self->workOut(next);
+            if (self->_waiting.empty() || self->_isWorking)
+                return;
+            const auto next = std::move(self->_waiting.front());
+            self->_waiting.pop_front();
+            self->workOut(next);
         });
     });
 }

@@ -4,6 +4,7 @@
 #include "platform/FolderLister.h"
 #include "platform/components/DocumentRows.h"
 
+#include <deque>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -12,9 +13,7 @@
 namespace platform::components {
 
 /// A new state of a folder's list and the way to it from the state before.
-struct FolderContentsUpdate {
-    std::shared_ptr<const DocumentRows> rows;
-    ui::ListChanges changes;
+struct FolderContentsUpdate : RowsStep {
     ListingStage stage;
     std::optional<Error> error; ///< with ListingStage::Failed
 };
@@ -42,6 +41,7 @@ public:
 private:
     using Snapshot = std::shared_ptr<const FolderSnapshot>;
     void snapshotArrived(Snapshot snapshot);
+    void wait(Snapshot snapshot);
     void workOut(Snapshot snapshot);
     void workOutInBackground(Snapshot snapshot);
     void adopt(const FolderContentsUpdate& update);
@@ -52,7 +52,8 @@ private:
     ListOrder _order;
     std::shared_ptr<FolderListing> _listing;
     std::shared_ptr<OperationQueue> _queue;
-    Snapshot _waiting; ///< the newest one that arrived while a difference is worked out
+    /// What arrived while a difference is worked out: the newest list, and its revisions since.
+    std::deque<Snapshot> _waiting;
     bool _isWorking = false;
 };
 

@@ -1,11 +1,9 @@
 #pragma once
 
 #include "platform/FolderLister.h"
-#include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
 
 #include <cstdint>
-#include <vector>
 
 namespace platform::components {
 
@@ -26,10 +24,6 @@ struct ListOrder {
     ListOrder sortedBy(OrderKey chosen) const;
     bool operator==(const ListOrder&) const = default;
 };
-
-/// The indexes of a snapshot's entries in an order; equal ones stay in the order of their names. A look at
-/// each item where the order needs it: off the main thread then.
-std::vector<std::uint32_t> orderedIndexes(const FolderSnapshot& snapshot, const ListOrder& order);
 
 /// The order that the user chose for a folder, kept between runs for the folders that were used last; else
 /// the default. Main thread.

@@ -39,11 +39,16 @@ std::optional<std::int64_t> numberOfItems(const Url& folder)
     return error ? std::nullopt : std::optional(count);
 }
 
+bool isContainer(FolderEntryKind kind)
+{
+    return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
+}
+
 std::string sizeText(const Url& url, FolderEntryKind kind, const AttributeMap& values)
 {
     if (kind == FolderEntryKind::Link)
         return localized("Link");
-    if (kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library) {
+    if (isContainer(kind)) {
         const auto count = numberOfItems(url);
         return count ? localizedPlural(".DICT.ITEMS.%d", {*count}) : std::string();
     }
@@ -72,6 +77,7 @@ void describe(RowDetails& details, const Url& url, FolderEntryKind kind, const A
 RowDetails readRowDetails(const Url& url, FolderEntryKind kind)
 {
     RowDetails details;
+    details.isContainer = isContainer(kind);
     services().fileCoordinator().coordinateReading(
         url, ReadingOptions::ImmediatelyAvailableMetadataOnly, [&](const Url& location) {
             if (const auto values = promisedItems().promisedItemResourceValues(location, detailKeys))

@@ -17,6 +17,7 @@ struct RowDetails {
     std::string text; ///< date and size, or date and number of items, and whether it is shared
     ui::DownloadState download = ui::DownloadState::Present;
     std::vector<std::string> tagNames;
+    bool isContainer = false; ///< what it holds changes without a notice in its own folder
     std::optional<Date> modified; ///< a document that is here: its thumbnail is of this version
 
     bool operator==(const RowDetails&) const = default;

@@ -65,6 +65,13 @@ public:
         _shared->wanted.clear();
     }
 
+    /// The same for one row.
+    void cancel(ui::RowId id)
+    {
+        const std::lock_guard lock(_shared->mutex);
+        _shared->wanted.erase(id);
+    }
+
 private:
     using Ticket = std::uint64_t;
     struct Found {
