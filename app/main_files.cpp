@@ -80,6 +80,28 @@ const char* kindName(platform::FileType type)
     return "other";
 }
 
+/// Brings a document here from the cloud, and waits for it.
+int fetch(const Url& url, host::system::GLibDispatch& dispatch)
+{
+    std::optional<std::optional<platform::Error>> ended;
+    const auto download = platform::services().cloudDocumentService().items().startDownload(
+        url, {nullptr, [&](const std::optional<platform::Error>& error) { ended = error; }});
+    dispatch.runMainQueueUntil([&] { return ended.has_value(); });
+    return report(*ended);
+}
+
+/// Saves the content of one document in the place of another's.
+int save(const Url& url, const Url& from)
+{
+    constexpr std::size_t mostBytes = 64UL * 1024 * 1024;
+    auto& files = platform::services().fileSystem();
+    const auto content = files.contentToReplace(from.path(), mostBytes);
+    const auto before = files.contentToReplace(url.path(), mostBytes);
+    if (!content || !before)
+        return report(content ? before.error : content.error);
+    return report(files.replaceContent(url.path(), *before, *content->bytes).error);
+}
+
 /// Prints what a user sees below a folder, sorted by path: the kind, a tab, the path. A document that hides a
 /// promise is listed once.
 int list(const Url& folder)
@@ -108,7 +130,7 @@ int list(const Url& folder)
 }
 
 /// The exit status; 2 for what is no command.
-int run(std::string_view command, const std::vector<Url>& urls)
+int run(std::string_view command, const std::vector<Url>& urls, host::system::GLibDispatch& dispatch)
 {
     if (command == "mkdir" && urls.size() == 1)
         return report(FileUtils::mkdir(urls[0]));
@@ -116,6 +138,10 @@ int run(std::string_view command, const std::vector<Url>& urls)
         return report(FileUtils::remove(urls[0]));
     if (command == "move" && urls.size() == 2)
         return report(FileUtils::moveTo(urls[0], urls[1]));
+    if (command == "save" && urls.size() == 2)
+        return save(urls[0], urls[1]);
+    if (command == "fetch" && urls.size() == 1)
+        return fetch(urls[0], dispatch);
     if (command == "list" && urls.size() == 1)
         return list(urls[0]);
     if (command == "evict" && urls.size() == 1)
@@ -132,7 +158,7 @@ int main(int argc, char** argv)
     host::system::installSystemLog();
     const std::vector<std::string> arguments(argv, argv + argc);
     // The queues end last: the services may still hand them work while they end.
-    const std::shared_ptr<platform::Dispatch> dispatch = std::make_shared<host::system::GLibDispatch>();
+    const auto dispatch = std::make_shared<host::system::GLibDispatch>();
     const auto top = installDrive(dispatch)->layout().defaultContainer();
     std::vector<Url> urls;
     for (std::size_t i = 2; i < arguments.size(); ++i)
@@ -142,11 +168,12 @@ int main(int argc, char** argv)
     const bool resolves = arguments.size() == 3 && arguments[1] == "resolve";
     // The main thread would look only as long as nobody notices.
     const int status = resolves ? std::async(std::launch::async, printLocation, arguments[2]).get()
-        : arguments.size() > 1  ? run(arguments[1], urls)
+        : arguments.size() > 1  ? run(arguments[1], urls, *dispatch)
                                 : 2;
     if (status == 2)
-        std::fputs(
-            "usage: tarrow-files list [PATH] | mkdir|remove|evict|docid PATH | move FROM TO | resolve ID\n",
+        std::fputs("usage: tarrow-files list [PATH] | mkdir|remove|evict|fetch|docid PATH | move FROM TO | "
+                   "save PATH FROM | "
+                   "resolve ID\n",
             stderr);
     platform::installServices({});
     return status;

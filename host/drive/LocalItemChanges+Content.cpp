@@ -144,14 +144,12 @@ Result<ItemVersion> LocalItemChanges::replaceContent(
         failure = file->write(content);
     if (failure == 0)
         failure = takeOver(*file, *document, {});
+    ItemVersion written;
     if (failure == 0)
-        failure = file->replace(_layout, document->entry, versionOf(document->found));
-    struct stat written;
-    if (failure == 0 && ::fstat(file->descriptor().get(), &written) != 0)
-        failure = errno;
+        failure = file->replace(_layout, document->entry, versionOf(document->found), written);
     if (failure != 0)
         return contentError(failure, path);
-    return versionOf(written);
+    return written;
 }
 
 std::optional<Error> LocalItemChanges::addDocument(

@@ -95,8 +95,18 @@ bool NewFile::isUnderPrivateName() const
         && own.st_dev == found.st_dev && own.st_ino == found.st_ino;
 }
 
-int NewFile::replace(
-    const DriveLayout& layout, const DriveEntry& entry, const platform::ItemVersion& expected)
+int NewFile::checkExchanged(const platform::ItemVersion& expected, platform::ItemVersion& written) const
+{
+    struct stat found, own;
+    if (::fstatat(_folder.get(), _name.c_str(), &found, AT_SYMLINK_NOFOLLOW) != 0
+        || ::fstat(_file.get(), &own) != 0)
+        return errno;
+    written = versionOf(own);
+    return isSameContent(versionOf(found), expected) ? 0 : ECANCELED;
+}
+
+int NewFile::replace(const DriveLayout& layout, const DriveEntry& entry,
+    const platform::ItemVersion& expected, platform::ItemVersion& written)
 {
     if (::fsync(_file.get()) != 0)
         return errno;
@@ -106,19 +116,13 @@ int NewFile::replace(
     if (failure != 0)
         return failure;
     // Only what was taken out can be looked at without somebody replacing it meanwhile.
-    struct stat found;
-    if (::fstatat(_folder.get(), _name.c_str(), &found, AT_SYMLINK_NOFOLLOW) != 0)
-        failure = errno;
-    else if (!isSameContent(versionOf(found), expected))
-        failure = ECANCELED;
-    else
+    failure = checkExchanged(expected, written);
+    if (failure == 0)
         failure = syncFolder(entry.folder);
-    if (failure != 0 && (exchange(entry) != 0 || !isUnderPrivateName())) {
+    const bool isKnown = failure == 0 || (exchange(entry) == 0 && isUnderPrivateName());
+    // What could not be looked at or removed is left to the next start.
+    if (!isKnown || ::unlinkat(_folder.get(), _name.c_str(), 0) != 0)
         _record->keep();
-        _name.clear();
-        return failure;
-    }
-    ::unlinkat(_folder.get(), _name.c_str(), 0);
     _name.clear();
     return failure;
 }

@@ -27,13 +27,16 @@ public:
     int publish(const DriveEntry& entry, const std::string& name);
     /// Syncs the file and gives it the name of one that is `expected`, which goes for good. Answers 0,
     /// ECANCELED when another version lies there by now, or the errno; nothing has changed then. After a kill
-    /// in between, both are there: one of them in the trash.
-    int replace(const DriveLayout& layout, const DriveEntry& entry, const platform::ItemVersion& expected);
+    /// in between, both are there: one of them in the trash. `written` is the version that lies there now.
+    int replace(const DriveLayout& layout, const DriveEntry& entry, const platform::ItemVersion& expected,
+        platform::ItemVersion& written);
 
 private:
     NewFile() = default;
     int takeHeldName(const DriveLayout& layout, const DriveEntry& entry);
     int exchange(const DriveEntry& entry) const;
+    /// 0 when what was taken out is `expected`.
+    int checkExchanged(const platform::ItemVersion& expected, platform::ItemVersion& written) const;
     bool isUnderPrivateName() const;
 
     std::optional<WorkRecord> _record;

@@ -4,6 +4,8 @@
 #include "host/system/Scheduler.h"
 #include "host/system/WorkerPool.h"
 
+#include <glib.h>
+
 #include <algorithm>
 #include <atomic>
 #include <thread>
@@ -144,6 +146,12 @@ std::unique_ptr<platform::Timer> GLibDispatch::startTimer(
 platform::Date GLibDispatch::now() const
 {
     return platform::Date::fromTimePoint(std::chrono::system_clock::now());
+}
+
+void GLibDispatch::runMainQueueUntil(const std::function<bool()>& isOver)
+{
+    while (!isOver())
+        g_main_context_iteration(nullptr, TRUE);
 }
 
 } // namespace host::system

@@ -4,6 +4,7 @@
 #include "platform/Dispatch.h"
 
 #include <array>
+#include <functional>
 #include <memory>
 
 namespace host::system {
@@ -29,6 +30,9 @@ public:
     std::unique_ptr<platform::Timer> startTimer(const std::shared_ptr<platform::Queue>& queue,
         platform::Duration period, platform::Duration leeway, platform::Work handler) override;
     platform::Date now() const override;
+    /// For programs without a window: runs what the main queue has until there is no more to wait for, which
+    /// is asked after each piece of work. Called on the main thread.
+    void runMainQueueUntil(const std::function<bool()>& isOver);
 
 private:
     std::shared_ptr<MainQueue> _mainQueue;

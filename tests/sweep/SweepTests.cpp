@@ -14,7 +14,16 @@ using sweep_tests::Drive;
 using sweep_tests::Fault;
 using sweep_tests::FileCall;
 
-using Sweep = sweep_tests::SweepFixture;
+class Sweep : public sweep_tests::SweepFixture {
+protected:
+    /// Which of two versions is wanted after a save that was interrupted only a person can say.
+    static testing::Matcher<std::vector<std::string>> isWhatMayBeLeft()
+    {
+        if (GetParam().arguments[0] == "save")
+            return testing::Each(std::string("trash/file.txt"));
+        return testing::IsEmpty();
+    }
+};
 
 bool isPart(const Drive& part, const Drive& whole)
 {
@@ -32,7 +41,6 @@ TEST_P(Sweep, AKillAtAnyCallLosesNothingAndTheNextStartPutsItRight)
     ASSERT_THAT(leftovers(), testing::IsEmpty());
     ASSERT_GE(whole.calls, 10);
     RecordProperty("calls", whole.calls);
-    const bool isRemoval = GetParam().arguments[0] == "remove";
 
     for (int point = 1; point <= whole.calls; ++point) {
         makeDrive();
@@ -46,13 +54,13 @@ TEST_P(Sweep, AKillAtAnyCallLosesNothingAndTheNextStartPutsItRight)
         SCOPED_TRACE("killed at call " + std::to_string(point) + ", " + what);
         ASSERT_TRUE(ending.wasKilled);
         EXPECT_TRUE(isNothingHalf(seen(), before));
-        EXPECT_TRUE(isAllThere(isRemoval ? after : before));
+        EXPECT_TRUE(isAllThere(isRemoval() ? after : before));
         startAgain();
         const auto now = seen();
         const bool isOnTheWay =
             GetParam().arguments[0] == "mkdir" && isPart(before, now) && isPart(now, after);
         EXPECT_TRUE(now == before || now == after || isOnTheWay) << differences(now, before);
-        EXPECT_THAT(leftovers(), testing::IsEmpty());
+        EXPECT_THAT(leftovers(), isWhatMayBeLeft());
     }
 }
 
@@ -77,15 +85,15 @@ TEST_P(Sweep, AFailureOfAnyCallLeavesAllAsItWasOrAllDone)
                 continue;
             SCOPED_TRACE(std::string(::strerrorname_np(error)) + " at call " + std::to_string(point) + ", "
                 + std::to_string(met.number) + " on " + met.subject);
-            const auto now = seen();
+            const auto now = noticed();
             // Only that the change reached the disk can fail once it is made.
             EXPECT_TRUE((now == before && ending.status != 0)
                 || (now == after && (ending.status == 0 || met.number == SYS_fsync)))
                 << "status " << ending.status << differences(now, before);
             if (!leftovers().empty())
                 startAgain();
-            EXPECT_THAT(leftovers(), testing::IsEmpty());
-            EXPECT_TRUE(seen() == now) << differences(seen(), now);
+            EXPECT_THAT(leftovers(), isWhatMayBeLeft());
+            EXPECT_TRUE(noticed() == now) << differences(noticed(), now);
         }
     }
 }

@@ -33,7 +33,8 @@ std::vector<Operation> operations()
         {"moveFileAcross", {"move", "file.txt", "target/new.txt"}, FileSystems::Several},
         {"moveFolderAcross", {"move", "folder", "target/new"}, FileSystems::Several},
         {"movePromiseAcross", {"move", "p.txt", "target/new.txt"}, FileSystems::Several},
-        {"evict", {"evict", "file.txt"}}};
+        {"save", {"save", "file.txt", "folder/a.txt"}}, {"evict", {"evict", "file.txt"}},
+        {"fetch", {"fetch", "p.txt"}}};
 }
 
 void SweepFixture::makeDrive() const
@@ -71,6 +72,12 @@ void SweepFixture::startAgain() const
     host::drive::Recovery(_layout, store).run();
 }
 
+bool SweepFixture::isRemoval() const
+{
+    const auto& command = GetParam().arguments[0];
+    return command == "remove" || command == "save";
+}
+
 Drive SweepFixture::seen() const
 {
     Drive drive;
@@ -89,6 +96,20 @@ Drive SweepFixture::seen() const
     return drive;
 }
 
+Drive SweepFixture::noticed() const
+{
+    static constexpr std::string_view promiseMark = "promise of ";
+    auto drive = seen();
+    const auto all = drive;
+    std::erase_if(drive, [&](const auto& item) {
+        if (!item.first.starts_with(promiseMark))
+            return false;
+        const auto document = all.find(item.first.substr(promiseMark.size()));
+        return document != all.end() && (document->second == item.second || item.second == "nothing");
+    });
+    return drive;
+}
+
 std::vector<std::string> SweepFixture::leftovers() const
 {
     std::vector<std::string> found;
@@ -100,7 +121,7 @@ std::vector<std::string> SweepFixture::leftovers() const
             ++contents;
         else if (name.starts_with(".trw") || path.starts_with(_layout.held() + '/')
             || path.starts_with(_layout.trash() + '/'))
-            found.push_back(path);
+            found.push_back(path.substr(_layout.home().size() + 1));
     }
     for (const auto& [path, content] : seen()) {
         if (path.starts_with("promise of ") && content != "nothing")

@@ -45,7 +45,11 @@ protected:
     /// What any program does when it starts on the drive.
     void startAgain() const;
 
+    /// It removes an item, or a document's content.
+    bool isRemoval() const;
     Drive seen() const;
+    /// The same without promises that say nothing beside the document that hides them.
+    Drive noticed() const;
     /// What should not be there once nobody works on the drive.
     std::vector<std::string> leftovers() const;
     /// Every content of a drive lies somewhere, under whatever name.
@@ -53,6 +57,7 @@ protected:
     /// No name shows anything but what was under some name before.
     static bool isNothingHalf(const Drive& now, const Drive& before);
     static std::string differences(const Drive& now, const Drive& before);
+    static std::string read(const std::string& path);
     static void write(const std::string& path, const std::string& content);
 
     const testing_support::TemporaryDirectory _folder;
@@ -60,7 +65,6 @@ protected:
 
 private:
     bool isForOtherFileSystem(const FileCall& call) const;
-    static std::string read(const std::string& path);
     void promise(const std::string& path, const std::string& content) const;
     std::string behind(const std::string& promisePath) const;
 };
