@@ -17,21 +17,28 @@ using platform::UserActivity;
 
 namespace {
 
+constexpr int titleLines = 2;
+
 /// The same for as long as one device shows one document.
 std::string keyOf(const ActivityOffer& offer)
 {
     return offer.deviceIdentifier + '\n' + offer.document.path();
 }
 
-/// A toast's title is markup, and names may hold anything.
-std::string titleOf(const ActivityOffer& offer)
+/// A toast's own title has one line, in which a phone would show neither the name nor the device in full.
+GtkWidget* makeTitle(const ActivityOffer& offer)
 {
     using platform::components::displayName;
-    const auto text = platform::localized("“%1$@” on %2$@",
-        {displayName(offer.document.lastPathComponent()), displayName(offer.deviceName)});
-    const std::unique_ptr<char, decltype(&g_free)> escaped(
-        g_markup_escape_text(text.data(), static_cast<gssize>(text.size())), g_free);
-    return escaped.get();
+    const auto text = platform::localized(
+        "“%1$@” on %2$@", {displayName(offer.document.lastPathComponent()), displayName(offer.deviceName)});
+    auto* title = gtk_label_new(text.c_str());
+    gtk_label_set_wrap(GTK_LABEL(title), TRUE);
+    gtk_label_set_wrap_mode(GTK_LABEL(title), PANGO_WRAP_WORD_CHAR);
+    gtk_label_set_lines(GTK_LABEL(title), titleLines);
+    gtk_label_set_ellipsize(GTK_LABEL(title), PANGO_ELLIPSIZE_END);
+    gtk_label_set_xalign(GTK_LABEL(title), 0);
+    gtk_widget_add_css_class(title, "heading");
+    return title;
 }
 
 std::string bookmarkOf(const UserActivity& activity)
@@ -87,7 +94,8 @@ void HandOverToasts::refresh()
 void HandOverToasts::show(const ActivityOffer& offer)
 {
     _shown = keyOf(offer);
-    _toast = ObjectRef<AdwToast>::retain(adw_toast_new(titleOf(offer).c_str()));
+    _toast = ObjectRef<AdwToast>::retain(adw_toast_new(""));
+    adw_toast_set_custom_title(_toast.get(), makeTitle(offer));
     adw_toast_set_button_label(_toast.get(), platform::localized("Continue").c_str());
     adw_toast_set_timeout(_toast.get(), 0);
     _connections.push_back(

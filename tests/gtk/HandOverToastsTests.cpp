@@ -50,7 +50,11 @@ protected:
         rest();
         return activity;
     }
-    std::string title() const { return toasts->toast() ? adw_toast_get_title(toasts->toast()) : ""; }
+    std::string title() const
+    {
+        auto* label = toasts->toast() ? adw_toast_get_custom_title(toasts->toast()) : nullptr;
+        return label ? gtk_label_get_label(GTK_LABEL(label)) : "";
+    }
     void press()
     {
         auto* button = findButton("Continue");
@@ -70,7 +74,7 @@ TEST_F(HandOverToastsTest, ContinuesWithWhatTheOtherDeviceShows)
 {
     EXPECT_EQ(toasts->toast(), nullptr);
     const auto activity = show("a <b> & c.txt");
-    EXPECT_TRUE(title().starts_with("“a &lt;b&gt; &amp; c.txt” on ")) << title();
+    EXPECT_TRUE(title().starts_with("“a <b> & c.txt” on ")) << title();
     press();
     EXPECT_EQ(continued, std::vector{*activity});
     EXPECT_EQ(toasts->toast(), nullptr);
