@@ -8,6 +8,8 @@ namespace host::previews {
 class PopplerDocuments : public platform::PagedDocumentOpener {
 public:
     platform::Result<std::shared_ptr<platform::PagedDocument>> open(const std::string& path) const override;
+    platform::Result<std::shared_ptr<platform::PagedDocumentEditing>> openForEditing(
+        std::shared_ptr<const std::string> bytes) const override;
 };
 
 } // namespace host::previews

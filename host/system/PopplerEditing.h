@@ -1,0 +1,34 @@
+#pragma once
+
+#include "host/system/PopplerPages.h"
+#include "platform/PagedDocumentEditing.h"
+
+#include <map>
+
+namespace host::system {
+
+/// Changes a PDF document with Poppler. An edit is taken back by reading the document anew and applying all
+/// the others again, so that nothing of what other programs have put into it is lost on the way.
+class PopplerEditing : public platform::PagedDocumentEditing {
+public:
+    static platform::Result<std::shared_ptr<platform::PagedDocumentEditing>> open(
+        std::shared_ptr<const std::string> bytes);
+
+    class Pages;
+    PopplerEditing(std::shared_ptr<const std::string> bytes, std::shared_ptr<Pages> pages);
+
+    std::shared_ptr<platform::PagedDocument> pages() const override;
+    std::vector<platform::FormField> fields(std::size_t page) const override;
+    std::optional<platform::Error> apply(const platform::PageEdit& edit) override;
+    std::optional<std::size_t> undo() override;
+    std::size_t editCount() const override;
+    platform::Result<std::string> written() const override;
+
+private:
+    std::shared_ptr<const std::string> _bytes;
+    std::shared_ptr<Pages> _pages;
+    mutable std::mutex _mutex; ///< of the edits: one is made at a time
+    std::vector<platform::PageEdit> _edits;
+};
+
+} // namespace host::system
