@@ -12,6 +12,7 @@ namespace platform {
 enum class Notification {
     ApplicationDidBecomeActive,
     ApplicationWillResignActive,
+    ApplicationWillTerminate, ///< nothing that is put in a queue now will run
     CloudIdentityDidChange,
     StorageOfferDidChange,
     ActivityOffersDidChange, ///< what other devices hand over; see ActivityHandOver

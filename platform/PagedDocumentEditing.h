@@ -13,7 +13,8 @@ struct FormField {
 
     std::uint32_t id = 0; ///< one in its document
     Kind kind = Kind::Text;
-    Rect place;
+    std::size_t page = 0;
+    Rect place; ///< on its page
     std::string name; ///< for people; may be empty
     std::string text; ///< of a text, and of a choice that takes other words
     bool isMultiline = false, isSecret = false; ///< of a text

@@ -78,6 +78,7 @@ void LookwellItemController::showMoveTarget(const Button&)
     static constexpr Operation op{"-[LookwellItemController showMoveTarget:]"};
     op.userAction("Pressed Move (LW)");
     op.info("Pressed Move");
+    keepEdits();
     if (const auto manager = itemManager())
         manager->showMoveTarget(shared_from_this());
 }
@@ -86,6 +87,7 @@ void LookwellItemController::showWarningAndDeleteDocument(const Button& sender)
 {
     static constexpr Operation op{"-[LookwellItemController showWarningAndDeleteDocument:]"};
     op.userAction("Pressed Delete (LW)");
+    keepEdits();
     if (const auto manager = itemManager())
         manager->showWarningAndDeleteDocumentBarButton(shared_from_this(), sender);
 }

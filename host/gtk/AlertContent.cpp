@@ -161,7 +161,7 @@ void AlertContent::rebuildButtons(const Alert& alert)
     _connections.clear();
     _buttons.clear();
     if (_buttonBox)
-        gtk_box_remove(GTK_BOX(widget()), _buttonBox);
+        gtk_box_remove(GTK_BOX(widget()), _shownButtons);
     const auto orientation = buttonOrientation(alert);
     _buttonBox = gtk_box_new(orientation, 0);
     gtk_box_set_homogeneous(GTK_BOX(_buttonBox), orientation == GTK_ORIENTATION_HORIZONTAL);
@@ -171,7 +171,10 @@ void AlertContent::rebuildButtons(const Alert& alert)
         _buttons.push_back(makeActionButton(action, alert));
         gtk_box_append(GTK_BOX(_buttonBox), _buttons.back());
     }
-    gtk_box_append(GTK_BOX(widget()), _buttonBox);
+    // More than anybody needs for a question are a list to choose from.
+    constexpr std::size_t mostButtons = 8;
+    _shownButtons = _buttons.size() > mostButtons ? makeScrolledBody(_buttonBox) : _buttonBox;
+    gtk_box_append(GTK_BOX(widget()), _shownButtons);
 }
 
 void AlertContent::mirror()

@@ -37,6 +37,7 @@ private:
     std::weak_ptr<Alert> _alert;
     ObjectRef<GtkWidget> _card;
     GtkWidget *_body, *_title, *_message, *_buttonBox = nullptr;
+    GtkWidget* _shownButtons = nullptr; ///< the box, or what scrolls it
     std::vector<GtkWidget*> _buttons; ///< in the order of the actions
     std::vector<std::shared_ptr<ViewPeer>> _peers;
     std::shared_ptr<Observer> _observer;

@@ -233,7 +233,10 @@ void GtkApplicationLoop::connectApplication()
                 g_free(uri);
             }
         }));
-    _connections.push_back(connectSignal<void()>(application, "shutdown", [this] { resignActive(); }));
+    _connections.push_back(connectSignal<void()>(application, "shutdown", [this] {
+        resignActive();
+        platform::services().notificationCenter().post(Notification::ApplicationWillTerminate);
+    }));
     for (const int number : {SIGTERM, SIGINT})
         g_unix_signal_add(
             number,

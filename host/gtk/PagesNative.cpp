@@ -23,6 +23,8 @@ constexpr GdkRGBA paperEdge{0, 0, 0, 0.25F};
 constexpr GdkRGBA foundColor{1, 0.85F, 0, 0.4F};
 constexpr GdkRGBA markedColor{1, 0.5F, 0, 0.55F};
 constexpr GdkRGBA selectedColor{0.2F, 0.5F, 0.9F, 0.35F};
+constexpr GdkRGBA fieldColor{0.2F, 0.5F, 0.9F, 0.14F};
+constexpr GdkRGBA activeFieldColor{0.1F, 0.4F, 0.9F, 1};
 
 graphene_rect_t toolkitRect(const Rect& rect)
 {
@@ -50,6 +52,8 @@ void PagesNative::start()
 {
     addShortcuts(widget(), _view);
     addSelection();
+    addTap();
+    addKeys();
     _connections.push_back(
         connectSignal<void()>(widget(), "map", [this] { gtk_widget_grab_focus(_scroller.canvas()); }));
     const auto view = _view.lock();
@@ -74,13 +78,14 @@ void PagesNative::addSelection()
     _connections.push_back(
         connectSignal<void(double, double)>(drag, "drag-begin", [this](double x, double y) {
             _selectionStart = _scroller.toContent({x, y});
+            _isHolding = false;
             if (const auto view = _view.lock())
                 view->clearSelection();
         }));
     _connections.push_back(
         connectSignal<void(double, double)>(drag, "drag-update", [this, drag, isFinger](double x, double y) {
             const auto view = _view.lock();
-            if (!view || isFinger())
+            if (!view || (isFinger() && !_isHolding))
                 return;
             double startX = 0, startY = 0;
             gtk_gesture_drag_get_start_point(GTK_GESTURE_DRAG(drag), &startX, &startY);
@@ -89,21 +94,60 @@ void PagesNative::addSelection()
     auto* hold = gtk_gesture_long_press_new();
     gtk_gesture_single_set_touch_only(GTK_GESTURE_SINGLE(hold), TRUE);
     gtk_widget_add_controller(_scroller.canvas(), GTK_EVENT_CONTROLLER(hold));
-    _connections.push_back(connectSignal<void(double, double)>(hold, "pressed", [this](double x, double y) {
-        constexpr double reach = 60; // points to both sides: about a word
-        const auto at = _scroller.toContent({x, y});
-        if (const auto view = _view.lock())
-            view->userSelects({at.x - reach, at.y}, {at.x + reach, at.y});
-    }));
+    _connections.push_back(
+        connectSignal<void(double, double)>(hold, "pressed", [this, drag](double x, double y) {
+            constexpr double reach = 60; // points to both sides: about a word
+            const auto at = _scroller.toContent({x, y});
+            _isHolding = true;
+            // From here on the finger selects, and scrolls no more.
+            gtk_gesture_set_state(GTK_GESTURE(drag), GTK_EVENT_SEQUENCE_CLAIMED);
+            if (const auto view = _view.lock())
+                view->userSelects({at.x - reach, at.y}, {at.x + reach, at.y});
+        }));
+}
+
+/// A press without a way: what is longer selects.
+void PagesNative::addTap()
+{
+    auto* click = gtk_gesture_click_new();
+    gtk_widget_add_controller(_scroller.canvas(), GTK_EVENT_CONTROLLER(click));
+    _connections.push_back(
+        connectSignal<void(int, double, double)>(click, "pressed", [this](int, double x, double y) {
+            _pressed = {x, y};
+        }));
+    _connections.push_back(
+        connectSignal<void(int, double, double)>(click, "released", [this](int, double x, double y) {
+            constexpr double steady = 8; // points, also of a finger
+            const auto view = _view.lock();
+            if (view && !_isHolding && std::hypot(x - _pressed.x, y - _pressed.y) <= steady)
+                view->userTaps(_scroller.toContent({x, y}));
+        }));
+}
+
+void PagesNative::addKeys()
+{
     auto* keys = gtk_event_controller_key_new();
     gtk_widget_add_controller(_scroller.canvas(), keys);
     _connections.push_back(connectSignal<gboolean(guint, guint, GdkModifierType)>(
         keys, "key-pressed", [this](guint key, guint, GdkModifierType modifiers) -> gboolean {
-            if ((modifiers & GDK_CONTROL_MASK) == 0 || key != GDK_KEY_c)
-                return FALSE;
-            previewShouldCopy();
-            return TRUE;
+            return pressed(key, (modifiers & GDK_CONTROL_MASK) != 0) ? TRUE : FALSE;
         }));
+}
+
+bool PagesNative::pressed(guint key, bool withControl)
+{
+    const auto view = _view.lock();
+    if (!view)
+        return false;
+    if (withControl && key == GDK_KEY_c)
+        previewShouldCopy();
+    else if (withControl && key == GDK_KEY_z)
+        view->userWantsUndo();
+    else if (view->isPlacing() && (key == GDK_KEY_Return || key == GDK_KEY_KP_Enter))
+        view->userPressesEnter();
+    else
+        return false;
+    return true;
 }
 
 void PagesNative::previewShouldCopy()
@@ -134,6 +178,8 @@ void PagesNative::previewContentDidChange()
 
 void PagesNative::previewNeedsDisplay()
 {
+    const auto view = _view.lock();
+    gtk_widget_set_cursor_from_name(_scroller.canvas(), view && view->isPlacing() ? "crosshair" : nullptr);
     gtk_widget_queue_draw(_scroller.canvas());
 }
 
@@ -225,11 +271,31 @@ void PagesNative::drawMarks(GtkSnapshot* snapshot, const PreviewPagesView& view,
         fill(snapshot, deck.toContent(page, match), foundColor);
     if (const auto marked = view.currentMatch(); marked && deck.pageAt(marked->midY()) == page)
         fill(snapshot, *marked, markedColor);
+    drawFields(snapshot, view, page);
     const auto selected = view.selection().find(page);
     if (selected == view.selection().end())
         return;
     for (const auto& place : selected->second.places)
         fill(snapshot, deck.toContent(page, place), selectedColor);
+}
+
+void PagesNative::drawFields(GtkSnapshot* snapshot, const PreviewPagesView& view, std::size_t page)
+{
+    const auto* active = view.activeField();
+    for (const auto& field : view.fields()) {
+        if (field.page != page)
+            continue;
+        const auto place = view.deck().toContent(page, field.place);
+        fill(snapshot, place, fieldColor);
+        if (&field != active)
+            continue;
+        GskRoundedRect outline;
+        const auto frame = toolkitRect({place.x - 2, place.y - 2, place.width + 4, place.height + 4});
+        gsk_rounded_rect_init_from_rect(&outline, &frame, 2);
+        constexpr float widths[] = {2, 2, 2, 2};
+        const GdkRGBA colors[] = {activeFieldColor, activeFieldColor, activeFieldColor, activeFieldColor};
+        gtk_snapshot_append_border(snapshot, &outline, widths, colors);
+    }
 }
 
 void PagesNative::drawBroken(GtkSnapshot* snapshot, const Rect& frame)

@@ -41,12 +41,17 @@ private:
         GtkSnapshot* snapshot, std::size_t key, const platform::Image& picture, const platform::Rect& place);
     void drawMarks(GtkSnapshot* snapshot, const View& view, std::size_t page);
     void drawBroken(GtkSnapshot* snapshot, const platform::Rect& frame);
+    void drawFields(GtkSnapshot* snapshot, const View& view, std::size_t page);
     void addSelection();
+    void addTap();
+    void addKeys();
+    bool pressed(guint key, bool withControl);
     void updateLabel();
 
     std::weak_ptr<View> _view;
     std::map<std::size_t, Shown> _shown; ///< textures, so that a picture is not handed over every frame
-    platform::Point _selectionStart;
+    platform::Point _selectionStart, _pressed; ///< in the content; in the window
+    bool _isHolding = false; ///< a finger that was held selects
     ZoomScroller _scroller;
     SignalConnections _connections;
 };

@@ -170,8 +170,11 @@ Result<std::string> bytesOf(PopplerDocument& document)
 
 std::vector<FormField> fieldsOn(const PopplerPages& pages, std::size_t index)
 {
-    return pages.withDocument(
-        [&](PopplerDocument& document) { return fieldsOf(PopplerPages::page(document, index).get()); });
+    return pages.withDocument([&](PopplerDocument& document) {
+        auto fields = fieldsOf(PopplerPages::page(document, index).get());
+        std::ranges::for_each(fields, [&](FormField& field) { field.page = index; });
+        return fields;
+    });
 }
 
 /// Whether two states of a document hold the same on a page, as far as edits change it.

@@ -201,6 +201,10 @@ void PageDeck::finish(const Task& task, std::optional<Image> picture, const Rect
 {
     if (task.page >= _pages.size())
         return;
+    // A detail of before is better than none, but only until the page itself is as fine.
+    if (_detail && !task.isDetail && _detail->task.page == task.page && _detail->task.pixelsPerPoint == 0
+        && isNear(task.pixelsPerPoint, fullPixelsPerPoint()))
+        _detail.reset();
     if (!task.isDetail)
         _kept.insert_or_assign(task.page, Kept{std::move(picture), task.pixelsPerPoint});
     else if (picture)
@@ -233,7 +237,8 @@ void PageDeck::forgetPictures()
     std::erase_if(_kept, [](const auto& entry) { return !entry.second.picture; });
     for (auto& [page, kept] : _kept)
         kept.pixelsPerPoint = 0;
-    _detail.reset();
+    if (_detail)
+        _detail->task.pixelsPerPoint = 0;
 }
 
 const Image* PageDeck::picture(std::size_t page) const

@@ -1,10 +1,12 @@
 #pragma once
 
+#include "platform/FileSystem.h"
 #include "platform/Geometry.h"
 #include "platform/ImageLoader.h"
 #include "platform/PagedDocument.h"
 
 #include <memory>
+#include <optional>
 #include <string>
 
 namespace platform::components {
@@ -28,6 +30,8 @@ struct PreviewContent {
     bool isSource = false; ///< of a text: it has a language of its own, and letters of one width
     std::shared_ptr<PagedDocument> pages;
     Size firstPage; ///< of pages, their own points
+    PagesRights rights; ///< of pages
+    std::optional<ItemVersion> version; ///< of pages: what was read
     std::string path, fileName;
     std::string iconName, title;
     std::string note; ///< of a text or a picture: what is left out of it

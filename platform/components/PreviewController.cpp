@@ -1,10 +1,12 @@
 #include "platform/components/PreviewController.h"
 
 #include "platform/Dispatch.h"
+#include "platform/FileSystem.h"
 #include "platform/ItemDownload.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/components/DisplayName.h"
+#include "platform/components/PreviewEditor.h"
 #include "platform/components/PreviewLoader.h"
 #include "platform/components/PreviewPictureView.h"
 #include "platform/components/PreviewScreenView.h"
@@ -80,6 +82,7 @@ void PreviewController::loadView()
         if (const auto screen = weak.lock())
             screen->beginSearch();
     });
+    _screen->toolbar()->setOnEdit(calling(&PreviewController::beginEditing));
     _screen->searchBar()->setOnClose([weak] {
         if (const auto screen = weak.lock())
             screen->endSearch();
@@ -110,6 +113,7 @@ void PreviewController::viewWillAppear(bool animated)
 void PreviewController::viewDidAppear(bool animated)
 {
     ViewController::viewDidAppear(animated);
+    _lastNavigation = navigationController();
     if (_content)
         startDownload();
 }
@@ -137,6 +141,7 @@ void PreviewController::didMoveToParentViewController(const std::shared_ptr<View
 /// Ends all work, and keeps nothing of the document but where it is.
 void PreviewController::close()
 {
+    leaveEditing();
     cancelLoad();
     leaveDownload();
     forgetContent();
@@ -144,6 +149,8 @@ void PreviewController::close()
 
 bool PreviewController::backRequested()
 {
+    if (_editor && _editor->backRequested())
+        return true;
     if (!_screen || !_screen->isSearching())
         return ViewController::backRequested();
     endSearch();
@@ -154,7 +161,10 @@ void PreviewController::reloadData()
 {
     const auto source = _dataSource.lock();
     const bool hasItem = source && source->numberOfPreviewItemsInPreviewController(*this) > 0;
-    _item = hasItem ? std::optional(source->previewControllerPreviewItemAtIndex(*this, 0)) : std::nullopt;
+    const auto next =
+        hasItem ? std::optional(source->previewControllerPreviewItemAtIndex(*this, 0)) : std::nullopt;
+    leaveEditing(next);
+    _item = next;
     cancelLoad();
     leaveDownload();
     forgetContent();
@@ -167,7 +177,9 @@ void PreviewController::reloadData()
 
 void PreviewController::refreshCurrentPreviewItem()
 {
-    if (_item)
+    if (_editor)
+        followChange();
+    else if (_item)
         load(previewLimitsForMainScreen());
 }
 
@@ -187,8 +199,9 @@ void PreviewController::load(const PreviewLimits& limits)
     const auto main = services().dispatch().mainQueue();
     _queue = services().dispatch().makeOperationQueue("preview", QualityOfService::UserInitiated);
     _queue->addOperation([weak = std::weak_ptr(self()), item = *_item, limits, generation = _generation, main,
-                             cancelled = _cancelled] {
-        if (*cancelled)
+                             cancelled = _cancelled, saved = _savedVersion] {
+        // What was saved here is shown already.
+        if (*cancelled || (saved && services().fileSystem().versionOfItem(item.path()) == saved))
             return;
         const auto content = std::make_shared<const PreviewContent>(
             loadPreview(item, limits, [&] { return cancelled->load(); }));
@@ -203,6 +216,7 @@ void PreviewController::forgetContent()
 {
     _content = nullptr;
     _previewView = nullptr;
+    _savedVersion.reset();
     if (!_screen)
         return;
     _screen->setSearching(false);
@@ -225,6 +239,7 @@ std::shared_ptr<const PreviewContent> PreviewController::withoutPlayer(
 void PreviewController::show(std::shared_ptr<const PreviewContent> content)
 {
     _content = withoutPlayer(std::move(content));
+    _savedVersion.reset();
     setTitle(_content->title);
     showContent();
 }
@@ -264,6 +279,7 @@ void PreviewController::connectPreview()
 {
     const auto shown = _screen->content() == _previewView ? _previewView : nullptr;
     _screen->toolbar()->setPreview(shown);
+    _screen->toolbar()->setCanEdit(canEdit());
     showToolbar();
     _screen->searchBar()->setPreview(shown);
     _screen->setNeedsLayout();
@@ -276,6 +292,8 @@ void PreviewController::connectPreview()
             return;
         screen->_screen->toolbar()->update();
         screen->_screen->searchBar()->update();
+        if (screen->_editor)
+            screen->_editor->update();
     });
     shown->setOnFind([weak] {
         if (const auto screen = weak.lock())
@@ -285,6 +303,7 @@ void PreviewController::connectPreview()
         if (const auto screen = weak.lock())
             screen->previewFailed(words);
     });
+    connectPages();
     if (const auto picture = std::dynamic_pointer_cast<PreviewPictureView>(shown))
         picture->setOnNeedsPixels([weak] {
             if (const auto screen = weak.lock())

@@ -1,6 +1,8 @@
 #pragma once
 
 #include "platform/Error.h"
+#include "platform/FileSystem.h"
+#include "platform/NotificationCenter.h"
 #include "platform/Url.h"
 #include "platform/components/PreviewControllerProtocols.h"
 #include "platform/ui/BarButtonItem.h"
@@ -10,6 +12,7 @@
 #include <functional>
 #include <memory>
 #include <optional>
+#include <vector>
 
 namespace platform {
 class ItemDownload;
@@ -17,11 +20,19 @@ class OperationQueue;
 struct DownloadProgress;
 } // namespace platform
 
+namespace platform::ui {
+class AlertController;
+class NavigationController;
+} // namespace platform::ui
+
 namespace platform::components {
 
 class PreviewScreenView;
+class PreviewEditing;
+class PreviewEditor;
 class PreviewSummaryView;
 class PreviewView;
+struct EditsKept;
 struct PreviewContent;
 struct PreviewLimits;
 
@@ -69,6 +80,16 @@ public:
     void beginSearch();
     void endSearch();
 
+    /// Whether the person may change what is shown: the delegate and the document allow it.
+    bool canEdit() const;
+    void beginEditing();
+    /// Keeps the edits, and goes back to reading.
+    void endEditing();
+    /// Keeps the edits that were made so far.
+    void keepEdits();
+    /// Null unless the document is being changed.
+    const std::shared_ptr<PreviewEditor>& editor() const { return _editor; }
+
     bool isDownloading() const { return _download != nullptr; }
     void startDownload();
     void cancelDownload();
@@ -85,6 +106,22 @@ private:
     void showDownload(const DownloadProgress& progress);
     void downloadEnded(const std::optional<Error>& error);
     void leaveDownload();
+    void editingBegan(const Result<std::shared_ptr<PreviewEditing>>& begun);
+    void showEditBars();
+    void connectPages();
+    void removeEditor();
+    void leaveEditing(const std::optional<Url>& newItem = std::nullopt);
+    void keep(const std::shared_ptr<PreviewEditing>& editing);
+    void kept(const std::shared_ptr<PreviewEditing>& editing, const EditsKept& outcome);
+    void askForUnsaved(const std::shared_ptr<PreviewEditing>& editing);
+    void addCopyAndDiscard(ui::AlertController& question, const std::shared_ptr<PreviewEditing>& editing);
+    void keptCopy(const std::shared_ptr<PreviewEditing>& editing, const EditsKept& outcome);
+    void showOnDisk(const std::shared_ptr<PreviewEditing>& editing);
+    void askAfterFailure(const std::shared_ptr<PreviewEditing>& editing, const EditsKept& outcome);
+    void followChange();
+    void programEnds();
+    void alert(const std::shared_ptr<ui::ViewController>& alert);
+    bool shouldSave(const Url& item);
     void startAgain();
     void openIn();
     std::function<void()> calling(void (PreviewController::*action)());
@@ -107,6 +144,12 @@ private:
     std::shared_ptr<PreviewView> _previewView; ///< kept while a failure is shown, for the place in it
     std::shared_ptr<PreviewSummaryView> _summary; ///< what is shown in place of content
     std::unique_ptr<ItemDownload> _download;
+    std::shared_ptr<PreviewEditor> _editor;
+    std::vector<std::shared_ptr<PreviewEditing>> _edited; ///< those whose edits may not be on the disk yet
+    bool _isEditingWanted = false; ///< the document is being read for it
+    std::optional<ItemVersion> _savedVersion; ///< what was saved here, which is shown already
+    std::weak_ptr<ui::NavigationController> _lastNavigation; ///< where to say what goes wrong afterwards
+    std::vector<Observation> _observations;
     bool _isDownloadWanted = true; ///< false once the person has stopped it
     ui::BarButtonItems _additionalItems;
     std::shared_ptr<OperationQueue> _queue;

@@ -138,6 +138,7 @@ PreviewContent textContent(PreviewContent content, const Reading& reading, bool 
 
 PreviewContent pagesContent(PreviewContent content)
 {
+    content.version = services().fileSystem().versionOfItem(content.path);
     const auto opened = services().pagedDocumentOpener().open(content.path);
     if (!opened.value)
         return failure(std::move(content),
@@ -145,6 +146,7 @@ PreviewContent pagesContent(PreviewContent content)
     content.kind = Kind::Pages;
     content.pages = *opened.value;
     content.firstPage = content.pages->pageSize(0);
+    content.rights = content.pages->rights();
     content.note.clear();
     return content;
 }

@@ -38,7 +38,8 @@ void PreviewPagesView::post(std::function<std::function<void(PreviewPagesView&)>
     });
 }
 
-void PreviewPagesView::setDocument(std::shared_ptr<PagedDocument> document, Size firstPage)
+/// What was to be done with the one before is dropped.
+void PreviewPagesView::take(std::shared_ptr<PagedDocument> document)
 {
     auto& dispatch = services().dispatch();
     ++_generation;
@@ -46,6 +47,20 @@ void PreviewPagesView::setDocument(std::shared_ptr<PagedDocument> document, Size
     _reading = dispatch.makeSerialQueue("preview page texts");
     _isDrawing = _isSelecting = false;
     _document = std::move(document);
+}
+
+void PreviewPagesView::continueWith(std::shared_ptr<PagedDocument> document)
+{
+    take(std::move(document));
+    _knowsSizes = false;
+    if (!query().empty() && !searchState().isComplete)
+        queryDidChange();
+    drawNext();
+}
+
+void PreviewPagesView::setDocument(std::shared_ptr<PagedDocument> document, Size firstPage)
+{
+    take(std::move(document));
     const auto count = std::min(_document->pageCount(), maxPages);
     std::vector<Size> pages(count, firstPage);
     // Until its own size is known, a page has the one that it had, else that of the first.
@@ -59,6 +74,9 @@ void PreviewPagesView::setDocument(std::shared_ptr<PagedDocument> document, Size
     _deck.setPages(std::move(pages));
     _currentPage = _deck.currentPage(_visible);
     _selection.clear();
+    _fields.clear();
+    _activeField.reset();
+    _isPlacing = false;
     _knowsSizes = count < 2;
     if (!query().empty())
         queryDidChange();
@@ -223,8 +241,13 @@ std::optional<Rect> PreviewPagesView::currentMatch() const
 void PreviewPagesView::mark(const Match& match)
 {
     _marked = match;
-    auto place = *currentMatch();
     needsDisplay();
+    reveal(*currentMatch());
+}
+
+void PreviewPagesView::reveal(const Rect& content)
+{
+    auto place = content;
     const bool isSeen = place.y >= _visible.y && place.maxY() <= _visible.maxY() && place.x >= _visible.x
         && place.maxX() <= _visible.maxX();
     if (isSeen)

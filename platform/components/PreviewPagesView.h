@@ -1,9 +1,11 @@
 #pragma once
 
 #include "platform/PagedDocument.h"
+#include "platform/PagedDocumentEditing.h"
 #include "platform/components/PageDeck.h"
 #include "platform/components/PreviewView.h"
 
+#include <functional>
 #include <map>
 #include <memory>
 #include <optional>
@@ -30,6 +32,8 @@ public:
 
     /// Shows a document. Where one was shown before, the place, the zoom and the search stay.
     void setDocument(std::shared_ptr<PagedDocument> document, Size firstPage);
+    /// Goes on with another object that holds the very same content.
+    void continueWith(std::shared_ptr<PagedDocument> document);
     const PageDeck& deck() const { return _deck; }
 
     bool canZoom() const override { return true; }
@@ -59,6 +63,38 @@ public:
     const std::map<std::size_t, PageText>& selection() const { return _selection; }
     std::string selectedText() const;
 
+    /// A place on a page.
+    struct PagePlace {
+        std::size_t page = 0;
+        Point point;
+    };
+    /// The person tapped on a place; Enter is a tap in the middle of what is seen.
+    void userTaps(Point content);
+    void userPressesEnter();
+    void setOnTap(std::function<void(const PagePlace&)> callback) { _onTap = std::move(callback); }
+    /// The topmost mark at a place, a little beside it for a finger; called later, and not when another
+    /// document is shown by then.
+    void findMark(const PagePlace& place, std::function<void(const std::optional<PageMark>&)> found);
+    /// The texts that are marked by the person, by page: what is selected, else the match of the search.
+    std::map<std::size_t, std::vector<Rect>> chosenPlaces() const;
+
+    // While the document is being changed.
+    /// What is shown has changed in itself: it is drawn anew, and all else stays.
+    void documentDidChange();
+    /// The fields of its form, which are tinted, and the one that is being filled in, which is brought into
+    /// sight.
+    void setFields(std::vector<FormField> fields);
+    const std::vector<FormField>& fields() const { return _fields; }
+    void setActiveField(std::optional<std::uint32_t> field);
+    const FormField* activeField() const; ///< null: none
+    const FormField* fieldAt(const PagePlace& place) const;
+    /// Whether the next tap says where something belongs.
+    bool isPlacing() const { return _isPlacing; }
+    void setPlacing(bool placing);
+    /// Ctrl+Z was pressed.
+    void userWantsUndo();
+    void setOnUndo(std::function<void()> callback) { _onUndo = std::move(callback); }
+
 protected:
     void queryDidChange() override;
 
@@ -71,6 +107,7 @@ private:
         Point from, to;
     };
 
+    void take(std::shared_ptr<PagedDocument> document);
     void readPageSizes();
     void drawNext();
     void drew(const PageDeck::Task& task, std::optional<Image> picture);
@@ -80,6 +117,7 @@ private:
     std::size_t rankOf(const Match& match) const;
     void publishSearch(bool isComplete);
     void readSelection();
+    void reveal(const Rect& content);
     void post(std::function<std::function<void(PreviewPagesView&)>(const PagedDocument&)> work,
         const std::shared_ptr<Queue>& queue);
     void needsDisplay();
@@ -100,6 +138,12 @@ private:
     std::optional<SelectionEnds> _wantedSelection;
     unsigned _selectionGeneration = 0; ///< of the latest clearing
     std::map<std::size_t, PageText> _selection;
+
+    std::vector<FormField> _fields;
+    std::optional<std::uint32_t> _activeField;
+    bool _isPlacing = false;
+    std::function<void(const PagePlace&)> _onTap;
+    std::function<void()> _onUndo;
 };
 
 } // namespace platform::components

@@ -1,5 +1,6 @@
 #include "platform/components/PreviewScreenView.h"
 
+#include "platform/components/PreviewFieldBar.h"
 #include "platform/components/PreviewSearchBar.h"
 #include "platform/components/PreviewToolbar.h"
 #include "platform/ui/Label.h"
@@ -74,6 +75,22 @@ void PreviewScreenView::setContent(const std::shared_ptr<ui::View>& content)
     setNeedsLayout();
 }
 
+void PreviewScreenView::setEditBars(
+    const std::shared_ptr<ui::View>& bar, const std::shared_ptr<ui::View>& barAbove)
+{
+    for (const auto& before : {_editBar, _barAbove}) {
+        if (before)
+            before->removeFromSuperview();
+    }
+    _editBar = bar;
+    _barAbove = barAbove;
+    for (const auto& now : {_barAbove, _editBar}) {
+        if (now)
+            addSubview(now);
+    }
+    setNeedsLayout();
+}
+
 void PreviewScreenView::layoutSubviews()
 {
     const double width = bounds().width;
@@ -84,11 +101,17 @@ void PreviewScreenView::layoutSubviews()
     };
     place(*_searchBar, PreviewSearchBar::barHeight);
     place(*_note, noteHeight);
-    const double below = _toolbar->isHidden() ? 0 : PreviewToolbar::barHeight;
+    const double above = _barAbove && !_barAbove->isHidden() ? PreviewFieldBar::barHeight : 0;
+    const double below = _editBar || !_toolbar->isHidden() ? PreviewToolbar::barHeight : 0;
     if (_content)
-        place(*_content, std::max(0.0, bounds().height - top - below));
+        place(*_content, std::max(0.0, bounds().height - top - above - below));
+    top = bounds().height - PreviewToolbar::barHeight - above;
+    if (_barAbove)
+        place(*_barAbove, PreviewFieldBar::barHeight);
     top = bounds().height - PreviewToolbar::barHeight;
-    place(*_toolbar, PreviewToolbar::barHeight);
+    _toolbar->setFrame({0, top, width, PreviewToolbar::barHeight});
+    if (_editBar)
+        _editBar->setFrame(_toolbar->frame());
 }
 
 } // namespace platform::components

@@ -23,6 +23,8 @@ public:
 
     const std::shared_ptr<PreviewSearchBar>& searchBar() const { return _searchBar; }
     const std::shared_ptr<PreviewToolbar>& toolbar() const { return _toolbar; }
+    /// Bars that stand below the content in place of the toolbar; null: none. A hidden one takes no room.
+    void setEditBars(const std::shared_ptr<ui::View>& bar, const std::shared_ptr<ui::View>& barAbove);
     const std::shared_ptr<ui::View>& content() const { return _content; }
     void setContent(const std::shared_ptr<ui::View>& content); ///< null: none
     const std::string& note() const;
@@ -38,7 +40,7 @@ private:
     std::shared_ptr<PreviewSearchBar> _searchBar;
     std::shared_ptr<PreviewToolbar> _toolbar;
     std::shared_ptr<ui::Label> _note;
-    std::shared_ptr<ui::View> _content;
+    std::shared_ptr<ui::View> _content, _editBar, _barAbove;
 };
 
 } // namespace platform::components

@@ -30,13 +30,14 @@ void PreviewToolbar::build()
 {
     _find = symbolButton("system-search-symbolic", localized("Search in document"));
     _copy = symbolButton("edit-copy-symbolic", localized("Copy"));
+    _edit = symbolButton("document-edit-symbolic", localized("Edit document"));
     _zoomOut = symbolButton("zoom-out-symbolic", localized("Smaller"));
     _zoomIn = symbolButton("zoom-in-symbolic", localized("Larger"));
     _page = std::make_shared<ui::Label>();
     _page->setFont(ui::Font::preferred(ui::TextStyle::Footnote));
     _page->setAlignment(ui::TextAlignment::Center);
     for (const auto& part :
-        std::initializer_list<std::shared_ptr<ui::View>>{_find, _copy, _page, _zoomOut, _zoomIn})
+        std::initializer_list<std::shared_ptr<ui::View>>{_find, _copy, _page, _edit, _zoomOut, _zoomIn})
         addSubview(part);
     const auto self = std::static_pointer_cast<PreviewToolbar>(shared_from_this());
     const auto act = [weak = std::weak_ptr(self)](auto action) {
@@ -53,6 +54,10 @@ void PreviewToolbar::build()
         if (const auto preview = bar._preview.lock())
             preview->copy();
     }));
+    _edit->setAction(act([](PreviewToolbar& bar) {
+        if (const auto call = bar._onEdit)
+            call();
+    }));
     _zoomOut->setAction(act([](PreviewToolbar& bar) { bar.zoomBy(1 / PreviewView::zoomStep); }));
     _zoomIn->setAction(act([](PreviewToolbar& bar) { bar.zoomBy(PreviewView::zoomStep); }));
     update();
@@ -62,6 +67,12 @@ void PreviewToolbar::zoomBy(double factor)
 {
     if (const auto preview = _preview.lock())
         preview->setZoom(preview->zoom() * factor);
+}
+
+void PreviewToolbar::setCanEdit(bool canEdit)
+{
+    _canEdit = canEdit;
+    update();
 }
 
 void PreviewToolbar::setPreview(const std::shared_ptr<PreviewView>& preview)
@@ -91,6 +102,7 @@ void PreviewToolbar::update()
     const bool zooms = preview && preview->canZoom();
     _find->setHidden(!preview || !preview->canSearch());
     _copy->setHidden(!preview || !preview->canCopy());
+    _edit->setHidden(!preview || !_canEdit);
     _zoomOut->setHidden(!zooms);
     _zoomIn->setHidden(!zooms);
     _zoomOut->setEnabled(zooms && preview->zoom() > PreviewView::minZoom);
@@ -99,6 +111,7 @@ void PreviewToolbar::update()
     _page->setText(page);
     _page->setHidden(page.empty());
     _page->setAccessibilityLabel(page.empty() ? page : localized("Page %@", {page}));
+    setNeedsLayout();
 }
 
 void PreviewToolbar::layoutSubviews()
@@ -110,7 +123,9 @@ void PreviewToolbar::layoutSubviews()
     };
     place(*_find, 0, barHeight);
     place(*_copy, barHeight, barHeight);
-    place(*_page, 2 * barHeight, std::max(0.0, width - 4 * barHeight));
+    const double pageEnd = width - (_edit->isHidden() ? 2 : 3) * barHeight;
+    place(*_page, 2 * barHeight, std::max(0.0, pageEnd - 2 * barHeight));
+    place(*_edit, pageEnd, barHeight);
     place(*_zoomOut, width - 2 * barHeight, barHeight);
     place(*_zoomIn, width - barHeight, barHeight);
 }

@@ -26,6 +26,9 @@ public:
     using ui::View::View;
 
     void setOnFind(std::function<void()> callback) { _onFind = std::move(callback); }
+    void setOnEdit(std::function<void()> callback) { _onEdit = std::move(callback); }
+    /// Whether the document can be changed here.
+    void setCanEdit(bool canEdit);
     /// Shows and acts on this view from now on; null: nothing.
     void setPreview(const std::shared_ptr<PreviewView>& preview);
     /// Shows the view's state anew.
@@ -37,6 +40,7 @@ public:
     {
         return _copy;
     } ///< shown while something is selected
+    const std::shared_ptr<ui::Button>& editButton() const { return _edit; }
     const std::shared_ptr<ui::Button>& zoomOutButton() const { return _zoomOut; }
     const std::shared_ptr<ui::Button>& zoomInButton() const { return _zoomIn; }
     const std::shared_ptr<ui::Label>& pageLabel() const { return _page; }
@@ -49,9 +53,10 @@ private:
     std::string pageText() const;
 
     std::weak_ptr<PreviewView> _preview;
-    std::shared_ptr<ui::Button> _find, _copy, _zoomOut, _zoomIn;
+    std::shared_ptr<ui::Button> _find, _copy, _edit, _zoomOut, _zoomIn;
     std::shared_ptr<ui::Label> _page;
-    std::function<void()> _onFind;
+    std::function<void()> _onFind, _onEdit;
+    bool _canEdit = false;
 };
 
 } // namespace platform::components

@@ -1,0 +1,61 @@
+#pragma once
+
+#include "platform/PagedDocumentEditing.h"
+#include "platform/ui/TextFieldDelegate.h"
+#include "platform/ui/View.h"
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace platform::ui {
+class Button;
+class Label;
+class TextField;
+} // namespace platform::ui
+
+namespace platform::components {
+
+/// The bar in which the field of a form is filled in: its name, and what it holds. It stands above the
+/// keyboard, where the field itself may be hidden or too small to write in. Main thread only.
+class PreviewFieldBar : public ui::View, private ui::TextFieldDelegate {
+public:
+    static constexpr double barHeight = 72; ///< points
+
+    static std::shared_ptr<PreviewFieldBar> create();
+    using ui::View::View;
+
+    /// Called when the person has written a text and goes on to the next field.
+    void setOnNext(std::function<void()> callback) { _onNext = std::move(callback); }
+    /// Called when the button is pressed that switches a box, or asks for a choice.
+    void setOnPress(std::function<void()> callback) { _onPress = std::move(callback); }
+
+    /// Shows a field. A text that is being written is not touched by the same field once more.
+    void setField(const FormField& field);
+    /// What was written and is not in the field yet; nothing when it is. It counts as taken then.
+    std::optional<std::string> takeText();
+
+    const std::shared_ptr<ui::Label>& nameLabel() const { return _name; }
+    const std::shared_ptr<ui::TextField>& textField() const { return _text; } ///< hidden for boxes
+    const std::shared_ptr<ui::Button>& button() const { return _button; } ///< hidden for texts
+
+    void layoutSubviews() override;
+
+private:
+    void build();
+    bool textFieldShouldReturn(ui::TextField& field) override;
+
+    std::optional<FormField> _field;
+    std::shared_ptr<ui::Label> _name;
+    std::shared_ptr<ui::TextField> _text;
+    std::shared_ptr<ui::Button> _button;
+    std::function<void()> _onNext, _onPress;
+};
+
+/// What a choice, a box or a button holds, in words.
+std::string fieldValueWords(const FormField& field);
+/// The name of a field for people; never empty.
+std::string fieldName(const FormField& field);
+
+} // namespace platform::components
