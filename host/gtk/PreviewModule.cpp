@@ -90,6 +90,14 @@ platform::Result<std::shared_ptr<platform::PagedDocument>> PreviewModule::open(c
     return missingError();
 }
 
+platform::Result<std::shared_ptr<platform::PagedDocumentEditing>> PreviewModule::openForEditing(
+    std::shared_ptr<const std::string> bytes) const
+{
+    if (const auto libraries = load())
+        return libraries->pagedDocuments().openForEditing(std::move(bytes));
+    return missingError();
+}
+
 std::string PreviewModule::missingWords()
 {
     return system::translated("The part of the program that shows such documents is missing.");

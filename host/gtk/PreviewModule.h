@@ -38,6 +38,8 @@ public:
 
     /// Loads first. Errors: that the module is missing, in words; else as the opener of the module.
     platform::Result<std::shared_ptr<platform::PagedDocument>> open(const std::string& path) const override;
+    platform::Result<std::shared_ptr<platform::PagedDocumentEditing>> openForEditing(
+        std::shared_ptr<const std::string> bytes) const override;
 
     /// What is said where the libraries are missing, and the error that says so.
     static std::string missingWords();

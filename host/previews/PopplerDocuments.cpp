@@ -1,7 +1,7 @@
 #include "host/previews/PopplerDocuments.h"
 
-#include "host/system/PopplerEditing.h"
-#include "host/system/PopplerPages.h"
+#include "host/previews/PopplerEditing.h"
+#include "host/previews/PopplerPages.h"
 #include "host/system/SystemErrors.h"
 
 #include <sys/stat.h>

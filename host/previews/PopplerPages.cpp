@@ -1,11 +1,11 @@
-#include "host/system/PopplerPages.h"
+#include "host/previews/PopplerPages.h"
 
 #include <cairo.h>
 
 #include <algorithm>
 #include <cmath>
 
-namespace host::system {
+namespace host::previews {
 
 using platform::Error;
 using platform::Image;
@@ -277,4 +277,4 @@ platform::PagesRights PopplerPages::rights() const
     });
 }
 
-} // namespace host::system
+} // namespace host::previews

@@ -1,11 +1,11 @@
 #pragma once
 
-#include "host/system/PopplerPages.h"
+#include "host/previews/PopplerPages.h"
 #include "platform/PagedDocumentEditing.h"
 
 #include <vector>
 
-namespace host::system {
+namespace host::previews {
 
 /// The fields of a page that a person may fill in, in the order of the form.
 std::vector<platform::FormField> fieldsOf(PopplerPage* page);
@@ -15,4 +15,4 @@ bool fillField(PopplerPage* page, const platform::FieldTextEdit& edit);
 bool fillField(PopplerPage* page, const platform::FieldStateEdit& edit);
 bool fillField(PopplerPage* page, const platform::FieldChoiceEdit& edit);
 
-} // namespace host::system
+} // namespace host::previews

@@ -1,11 +1,11 @@
 #pragma once
 
-#include "host/system/PopplerPages.h"
+#include "host/previews/PopplerPages.h"
 #include "platform/PagedDocumentEditing.h"
 
 #include <map>
 
-namespace host::system {
+namespace host::previews {
 
 /// Changes a PDF document with Poppler. An edit is taken back by reading the document anew and applying all
 /// the others again, so that nothing of what other programs have put into it is lost on the way.
@@ -31,4 +31,4 @@ private:
     std::vector<platform::PageEdit> _edits;
 };
 
-} // namespace host::system
+} // namespace host::previews

@@ -1,7 +1,7 @@
-#include "host/system/PopplerEditing.h"
+#include "host/previews/PopplerEditing.h"
 
+#include "host/previews/PopplerFields.h"
 #include "host/system/FileDescriptor.h"
-#include "host/system/PopplerFields.h"
 
 #include <sys/mman.h>
 #include <sys/stat.h>
@@ -14,8 +14,9 @@
 #include <set>
 #include <string_view>
 
-namespace host::system {
+namespace host::previews {
 
+using host::system::FileDescriptor;
 using platform::Error;
 using platform::FormField;
 using platform::PagedDocumentEditing;
@@ -382,4 +383,4 @@ Result<std::string> PopplerEditing::written() const
     return *content;
 }
 
-} // namespace host::system
+} // namespace host::previews

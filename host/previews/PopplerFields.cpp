@@ -1,8 +1,8 @@
-#include "host/system/PopplerFields.h"
+#include "host/previews/PopplerFields.h"
 
 #include <algorithm>
 
-namespace host::system {
+namespace host::previews {
 
 using platform::FormField;
 using platform::Rect;
@@ -174,4 +174,4 @@ bool fillField(PopplerPage* page, const platform::FieldChoiceEdit& edit)
     return true;
 }
 
-} // namespace host::system
+} // namespace host::previews

@@ -8,7 +8,7 @@
 #include <mutex>
 #include <utility>
 
-namespace host::system {
+namespace host::previews {
 
 template <typename T>
 struct Unref {
@@ -70,4 +70,4 @@ private:
     std::size_t _count;
 };
 
-} // namespace host::system
+} // namespace host::previews
