@@ -271,7 +271,7 @@ void PreviewController::showPreview(const std::shared_ptr<PreviewView>& preview)
 void PreviewController::showToolbar()
 {
     const bool isMiniature = parent() && !navigationController();
-    _screen->toolbar()->setHidden(isMiniature || _screen->toolbar()->isEmpty());
+    _screen->toolbar()->setHidden(isMiniature || _editor || _screen->toolbar()->isEmpty());
     _screen->setNeedsLayout();
 }
 

@@ -16,7 +16,7 @@ inline std::string formPdf(const std::string& trailer = {})
     const std::string drawing = "BT /F 20 Tf 30 40 Td (Hello wonderful) Tj ET";
     const auto stream = [](const std::string& dictionary, const std::string& content) {
         return "<<" + dictionary + "/Length " + std::to_string(content.size()) + ">>stream\n" + content
-            + "\nendstream";
+            + "\nendstream ";
     };
     const std::map<int, std::string> objects{
         {1,
