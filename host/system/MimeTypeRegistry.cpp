@@ -1,5 +1,6 @@
 #include "host/system/MimeTypeRegistry.h"
 
+#include "host/system/Translate.h"
 #include "host/system/TypeGraph.h"
 #include "host/system/TypeTable.h"
 
@@ -17,6 +18,7 @@ namespace {
 constexpr std::size_t maximumExtension = 32;
 // Names that a program makes up must not fill the memory.
 constexpr std::size_t maximumCachedAnswers = 4096;
+constexpr std::string_view unknownMimeType = "application/octet-stream";
 
 using GlibText = std::unique_ptr<char, decltype(&g_free)>;
 
@@ -131,7 +133,10 @@ std::optional<std::string> MimeTypeRegistry::description(std::string_view type) 
         return description;
     const auto mime = mimeType(type);
     const GlibText text(mime ? g_content_type_get_description(mime->c_str()) : nullptr, g_free);
-    if (text)
+    // The database calls what it does not know "unknown", which says nothing where a kind is named.
+    if (mime == unknownMimeType)
+        description = translated("Unknown kind");
+    else if (text)
         description = text.get();
     _descriptions->add(type, description);
     return description;

@@ -72,6 +72,7 @@ TEST_F(TypeRegistryTest, DescribesAndPictures)
 {
     EXPECT_EQ(types.description("public.pdf"), "PDF document");
     EXPECT_EQ(types.description("dyn.mime.text/x-adasrc"), "Ada source code");
+    EXPECT_EQ(types.description("public.data"), "Unknown kind");
     EXPECT_EQ(types.description("public.image"), std::nullopt);
     EXPECT_EQ(types.description("what.ever"), std::nullopt);
     EXPECT_EQ(types.iconName("public.directory"), "folder");
