@@ -34,10 +34,30 @@ NavigationPeer::NavigationPeer(std::shared_ptr<PeerContext> context,
     adw_leaflet_set_can_unfold(leaflet(), FALSE);
     adw_leaflet_set_transition_type(leaflet(), ADW_LEAFLET_TRANSITION_TYPE_SLIDE);
     _bin.setChild(_leaflet.get());
-    _connections.push_back(
-        connectNotify(_leaflet.get(), "notify::visible-child", [this] { visibleChildChanged(); }));
+    forgetFingersThatLeft();
     _connections.push_back(connectNotify(
         _leaflet.get(), "notify::child-transition-running", [this] { transitionRunningChanged(); }));
+}
+
+/// Under X the gestures of the leaflet wait for ever for the end of a touch that a list in it took over, and
+/// follow no finger any more.
+void NavigationPeer::forgetFingersThatLeft()
+{
+    auto* events = gtk_event_controller_legacy_new();
+    gtk_event_controller_set_propagation_phase(events, GTK_PHASE_CAPTURE);
+    gtk_widget_add_controller(_leaflet.get(), events);
+    _connections.push_back(connectSignal<gboolean(GdkEvent*)>(events, "event", [this](GdkEvent* event) {
+        const bool isFirstFinger = gdk_event_get_event_type(event) == GDK_TOUCH_BEGIN
+            && gdk_touch_event_get_emulating_pointer(event);
+        const auto controllers = ObjectRef<GListModel>::adopt(gtk_widget_observe_controllers(_leaflet.get()));
+        for (guint i = 0; isFirstFinger && i < g_list_model_get_n_items(controllers.get()); ++i) {
+            const auto controller =
+                ObjectRef<GObject>::adopt(static_cast<GObject*>(g_list_model_get_item(controllers.get(), i)));
+            if (GTK_IS_GESTURE(controller.get()))
+                gtk_event_controller_reset(GTK_EVENT_CONTROLLER(controller.get()));
+        }
+        return FALSE;
+    }));
 }
 
 NavigationPeer::~NavigationPeer()
@@ -140,25 +160,29 @@ void NavigationPeer::showWithoutMovement(const Screen& screen)
     settle();
 }
 
-void NavigationPeer::visibleChildChanged()
-{
-    const auto stack = _navigation.lock();
-    const auto top = topPage();
-    auto* visible = adw_leaflet_get_visible_child(leaflet());
-    if (_mirroring || !stack || !top || !visible || visible == top->widget())
-        return;
-    // A swipe went back without asking. If the model will not follow, the top page comes back.
-    if (!stack->userWentBack()) {
-        _mirroring = true;
-        adw_leaflet_set_visible_child(leaflet(), top->widget());
-        _mirroring = false;
-    }
-}
-
 void NavigationPeer::transitionRunningChanged()
 {
-    if (!_mirroring && !adw_leaflet_get_child_transition_running(leaflet()))
+    if (_mirroring || adw_leaflet_get_child_transition_running(leaflet()))
+        return;
+    const auto top = topPage();
+    auto* visible = adw_leaflet_get_visible_child(leaflet());
+    if (top && visible && visible != top->widget())
+        swipedAway(*top);
+    else
         settle();
+}
+
+/// A swipe shows the page below from its beginning, and only its end says whether it went back. If the model
+/// will not follow, the top page comes back.
+void NavigationPeer::swipedAway(const ScreenPage& top)
+{
+    const auto keepsSelf = shared_from_this();
+    const auto stack = _navigation.lock();
+    if (stack && stack->userWentBack())
+        return;
+    _mirroring = true;
+    adw_leaflet_set_visible_child(leaflet(), top.widget());
+    _mirroring = false;
 }
 
 /// The top screen stands: what waits for that runs, and the pages are brought in order in the next frame.

@@ -43,8 +43,9 @@ private:
     std::shared_ptr<ScreenPage> knownPageOf(const Screen& screen) const;
     void showWithoutMovement(const Screen& screen);
     void showMoving(const platform::ui::NavigationTransition& transition);
-    void visibleChildChanged();
+    void forgetFingersThatLeft();
     void transitionRunningChanged();
+    void swipedAway(const ScreenPage& top);
     void settle();
     void removeStalePages();
     void ensurePageBelowTop();
