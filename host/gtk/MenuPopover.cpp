@@ -1,5 +1,6 @@
 #include "host/gtk/MenuPopover.h"
 
+#include "host/gtk/DismissingTouch.h"
 #include "host/gtk/ImagePaint.h"
 #include "host/gtk/ObjectRef.h"
 #include "host/gtk/Signal.h"
@@ -108,6 +109,7 @@ void showMenu(GtkWidget* parent, double x, double y, const ui::Menu& menu)
         restoreFocus(popover, before.get());
         endLater(popover);
     });
+    keepDismissingTouchFromWindow(popover);
     gtk_popover_popup(GTK_POPOVER(popover));
 }
 

@@ -1,5 +1,7 @@
 #include "host/gtk/PopoverLayer.h"
 
+#include "host/gtk/DismissingTouch.h"
+
 #include <utility>
 
 namespace host::gtk {
@@ -15,6 +17,7 @@ PopoverLayer::PopoverLayer(GtkWidget* parent, const GdkRectangle& anchor, GtkPos
     gtk_widget_set_parent(_popover.get(), parent);
     gtk_popover_set_pointing_to(popover, &anchor);
     gtk_popover_set_position(popover, side);
+    keepDismissingTouchFromWindow(_popover.get());
     _onClosed = connectSignal<void()>(popover, "closed", [this, call = std::move(onOutside)] {
         const bool byUser = std::exchange(_shown, false);
         if (const auto outside = call; byUser && outside)
