@@ -52,6 +52,23 @@ std::optional<GdkRectangle> boundsIn(GtkWidget* canvas, GtkWidget* widget, std::
         std::max(1, whole(rect.width)), std::max(1, whole(rect.height))};
 }
 
+/// The rectangle of a view, which may be one that only marks a place in another that is shown.
+std::optional<GdkRectangle> boundsIn(
+    GtkWidget* canvas, const PeerContext& context, const ui::View& view, const platform::Rect& rect)
+{
+    auto shown = const_cast<ui::View&>(view).shared_from_this();
+    const auto isShown = [&] {
+        const auto* peer = context.peerOf(*shown);
+        return peer && gtk_widget_get_mapped(peer->widget());
+    };
+    while (!isShown()) {
+        shown = shown->superview();
+        if (!shown)
+            return std::nullopt;
+    }
+    return boundsIn(canvas, context.peerOf(*shown)->widget(), view.convertRect(rect, *shown));
+}
+
 /// Where a popover points at, in the window; nothing when there is no such place now.
 std::optional<GdkRectangle> anchorOf(
     const PeerContext& context, GtkWidget* canvas, const ui::PopoverAnchor& anchor)
@@ -62,8 +79,7 @@ std::optional<GdkRectangle> anchorOf(
     }
     if (const auto* place = std::get_if<ui::ViewAnchor>(&anchor)) {
         const auto view = place->view.lock();
-        const auto* peer = view ? context.peerOf(*view) : nullptr;
-        return peer ? boundsIn(canvas, peer->widget(), place->rect) : std::nullopt;
+        return view ? boundsIn(canvas, context, *view, place->rect) : std::nullopt;
     }
     return std::nullopt;
 }

@@ -49,6 +49,13 @@ bool endsTyping(guint key)
 
 } // namespace
 
+bool ListViewPeer::isShiftHeld() const
+{
+    auto* seat = gdk_display_get_default_seat(gtk_widget_get_display(_listWidget));
+    auto* keyboard = seat ? gdk_seat_get_keyboard(seat) : nullptr;
+    return keyboard && (gdk_device_get_modifier_state(keyboard) & GDK_SHIFT_MASK) != 0;
+}
+
 GtkWidget* ListViewPeer::focusedRow() const
 {
     auto* root = gtk_widget_get_root(_listWidget);
@@ -61,14 +68,14 @@ GtkWidget* ListViewPeer::focusedRow() const
 
 GtkWidget* ListViewPeer::rowAt(double x, double y) const
 {
-    auto* found = gtk_widget_pick(_listWidget, x, y, GTK_PICK_DEFAULT);
+    auto* found = gtk_widget_pick(native(), x, y, GTK_PICK_DEFAULT);
     while (found && found != _listWidget && !ListRowWidget::isRow(found)) {
         auto* child = gtk_widget_get_first_child(found);
         if (child && ListRowWidget::isRow(child))
             return child;
         found = gtk_widget_get_parent(found);
     }
-    return found == _listWidget ? nullptr : found;
+    return found && ListRowWidget::isRow(found) ? found : nullptr;
 }
 
 bool ListViewPeer::keyPressed(guint key, GdkModifierType modifiers)

@@ -5,7 +5,6 @@
 #include "host/gtk/RowModel.h"
 
 #include <algorithm>
-#include <cmath>
 
 namespace host::gtk {
 
@@ -25,7 +24,6 @@ constexpr std::size_t seenMargin = 2;
 constexpr std::size_t mostSplices = 16;
 constexpr double textMargin =
     10; ///< points above and below a row's texts, half the distance between them included
-constexpr double markDragStart = 8; ///< points; a finger that only taps moves less
 constexpr int layoutFrames = 2; ///< after so many frames new rows have their heights
 constexpr int focusFrames = 4; ///< a row that was scrolled to has its widget after one or two
 
@@ -33,13 +31,6 @@ template <typename Observer, typename Peer>
 std::shared_ptr<Observer> observing(Peer& peer)
 {
     return std::shared_ptr<Observer>(peer.shared_from_this(), static_cast<Observer*>(&peer));
-}
-
-bool isShiftHeld(GtkWidget* widget)
-{
-    auto* seat = gdk_display_get_default_seat(gtk_widget_get_display(widget));
-    auto* keyboard = seat ? gdk_seat_get_keyboard(seat) : nullptr;
-    return keyboard && (gdk_device_get_modifier_state(keyboard) & GDK_SHIFT_MASK) != 0;
 }
 
 /// What two lines of text and the margins around them need, which with large text is more than the usual.
@@ -109,6 +100,8 @@ ListViewPeer::~ListViewPeer()
     context().scheduler().cancel(&_growKey);
     context().scheduler().cancel(&_focusKey);
     context().scheduler().cancel(&_scrollKey);
+    context().scheduler().cancel(&_onScroll);
+    context().scheduler().cancel(&_hasStrayed);
     _onScroll.disconnect();
     // The list ends now, while its rows' handlers are still connected to this.
     gtk_list_view_set_model(GTK_LIST_VIEW(_listWidget), nullptr);
@@ -159,6 +152,10 @@ void ListViewPeer::connectInput()
         connectSignal<void(guint)>(_listWidget, "activate", [this](guint position) { activated(position); }));
     auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
     _onScroll = connectSignal<void()>(adjustment, "value-changed", [this] { scrolled(); });
+    connect(connectSignal<void()>(adjustment, "changed", [this] {
+        // Not now: the list is being laid out.
+        context().scheduler().scheduleNextFrame(&_onScroll, [this] { followFingerEvenIfAllIsSeen(); });
+    }));
     connect(connectSignal<void(GtkPositionType)>(_window, "edge-overshot", [this](GtkPositionType edge) {
         const auto list = _list.lock();
         if (list && edge == GTK_POS_TOP && list->isRefreshable() && !list->isRefreshing())
@@ -178,33 +175,7 @@ void ListViewPeer::connectInput()
     connect(connectSignal<void(int, double, double)>(
         click, "pressed", [this](int, double x, double y) { showMenuOfList(x, y); }));
     connectMarks();
-}
-
-/// To draw along the check marks selects or deselects all rows on the way.
-void ListViewPeer::connectMarks()
-{
-    auto* drag = gtk_gesture_drag_new();
-    gtk_event_controller_set_propagation_phase(GTK_EVENT_CONTROLLER(drag), GTK_PHASE_CAPTURE);
-    gtk_widget_add_controller(_listWidget, GTK_EVENT_CONTROLLER(drag));
-    connect(connectSignal<void(double, double)>(drag, "drag-begin", [this, drag](double x, double y) {
-        auto* row = rowAt(x, y);
-        double rowX = 0, rowY = 0;
-        if (row)
-            gtk_widget_translate_coordinates(_listWidget, row, x, y, &rowX, &rowY);
-        const bool isMark = row && !isShiftHeld(_listWidget) && ListRowWidget::isOnMark(row, rowX);
-        gtk_gesture_set_state(drag, isMark ? GTK_EVENT_SEQUENCE_CLAIMED : GTK_EVENT_SEQUENCE_DENIED);
-        if (const auto list = _list.lock(); list && isMark)
-            list->activateRow(ListRowWidget::position(row));
-    }));
-    connect(connectSignal<void(double, double)>(drag, "drag-update", [this, drag](double x, double y) {
-        double startX = 0, startY = 0;
-        gtk_gesture_drag_get_start_point(GTK_GESTURE_DRAG(drag), &startX, &startY);
-        auto* row = rowAt(startX, startY + y);
-        const auto list = _list.lock();
-        const bool hasMoved = std::hypot(x, y) >= markDragStart;
-        if (list && row && hasMoved && list->selectionMode() == ui::SelectionMode::Multiple)
-            list->extendSelectionTo(ListRowWidget::position(row));
-    }));
+    connectStrayingFinger();
 }
 
 void ListViewPeer::setUpRow(GtkListItem* item)
@@ -230,8 +201,16 @@ void ListViewPeer::setUpRow(GtkListItem* item)
     };
     auto* press = gtk_gesture_long_press_new();
     gtk_widget_add_controller(row, GTK_EVENT_CONTROLLER(press));
-    connectForLife<void(double, double)>(press, "pressed",
-        [hold = answer(&ListViewPeer::held), press](double x, double y) { hold(press, x, y); });
+    connectForLife<void(double, double)>(
+        press, "pressed", [peer, hold = answer(&ListViewPeer::held), press](double x, double y) {
+            hold(press, x, y);
+            if (const auto self = peer.lock())
+                self->waitForPressOn();
+        });
+    connectForLife<void(GdkEventSequence*)>(press, "end", [peer](GdkEventSequence*) {
+        if (const auto self = peer.lock())
+            ++self->_holds;
+    });
     auto* click = gtk_gesture_click_new();
     gtk_gesture_single_set_button(GTK_GESTURE_SINGLE(click), GDK_BUTTON_SECONDARY);
     gtk_widget_add_controller(row, GTK_EVENT_CONTROLLER(click));
@@ -320,10 +299,10 @@ std::vector<GtkWidget*> ListViewPeer::liveRows() const
 void ListViewPeer::activated(guint position)
 {
     const auto list = _list.lock();
-    if (!list)
+    if (!list || _hasStrayed)
         return;
     const auto keepsSelf = shared_from_this();
-    if (list->selectionMode() == ui::SelectionMode::Multiple && isShiftHeld(_listWidget))
+    if (list->selectionMode() == ui::SelectionMode::Multiple && isShiftHeld())
         list->extendSelectionTo(position);
     else
         list->activateRow(position);
@@ -361,13 +340,6 @@ void ListViewPeer::showMenuOfList(double x, double y)
     gtk_widget_translate_coordinates(_listWidget, widget(), x, y, &listX, &listY);
     if (list)
         showMenu(widget(), listX, listY, list->menuForList());
-}
-
-void ListViewPeer::held(GtkWidget* row, double x, double y)
-{
-    const auto list = _list.lock();
-    if (list && !list->holdRow(ListRowWidget::position(row)))
-        showMenuOf(row, x, y);
 }
 
 bool ListViewPeer::grabFocus()

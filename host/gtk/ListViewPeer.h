@@ -43,10 +43,12 @@ private:
     void connectFactory(GtkListItemFactory* factory);
     void connectInput();
     void connectMarks();
+    void connectStrayingFinger();
     void setUpRow(GtkListItem* item);
     void bindRow(GtkListItem* item);
     void activated(guint position);
     void scrolled();
+    void followFingerEvenIfAllIsSeen();
     /// Lets the widgets know of as many rows as a frame can make widgets for, and of more in the next frames.
     void showRows(std::size_t count);
     void growRows();
@@ -63,6 +65,7 @@ private:
     void showMenuOf(GtkWidget* row, double x, double y);
     void showMenuOfList(double x, double y);
     void held(GtkWidget* row, double x, double y);
+    void waitForPressOn();
 
     // The keyboard.
     bool keyPressed(guint key, GdkModifierType modifiers);
@@ -70,6 +73,7 @@ private:
     bool listKeyPressed(guint key, GdkModifierType modifiers);
     bool extendByKey(std::size_t from, guint key);
     bool typedAhead(guint key, GdkModifierType modifiers);
+    bool isShiftHeld() const;
     GtkWidget* focusedRow() const;
     GtkWidget* rowAt(double x, double y) const;
     /// Gives the keyboard to a row as soon as it has a widget.
@@ -83,6 +87,8 @@ private:
     bool _isSplicing = false; ///< rows are not at their final places
     SignalConnection _onScroll;
     platform::ui::TypeAhead _typeAhead;
+    bool _hasStrayed = false; ///< the finger that leaves the screen now did
+    int _holds = 0; ///< counts the fingers that held a row, so that an earlier one does not press on
     int _focusKey = 0; ///< its address names the focusing of a row in the scheduler
     int _scrollKey = 0; ///< its address names the second step of a scrolling in the scheduler
     int _growKey = 0; ///< its address names the growing of the list in the scheduler

@@ -160,7 +160,22 @@ void DocumentListController::perform(DocumentListAction action, const Url& url)
 {
     if (const auto told = delegate())
         told->documentListControllerPerformActionURLOriginatingViewCompletion(
-            self(), static_cast<int>(action), url, _listView, {});
+            self(), static_cast<int>(action), url, anchorFor(url), {});
+}
+
+std::shared_ptr<ui::View> DocumentListController::anchorFor(const Url& url)
+{
+    const auto rows = _rows->rows();
+    const auto [first, count] = _listView->visibleRows();
+    for (std::size_t index = first; rows && index < std::min(first + count, rows->count()); ++index) {
+        if (rows->url(index) != url)
+            continue;
+        const double top = static_cast<double>(index) * _listView->rowHeight() - _listView->contentOffset().y;
+        const auto& list = _listView->frame();
+        _rowAnchor->setFrame({list.x, list.y + top, list.width, _listView->rowHeight()});
+        return _rowAnchor;
+    }
+    return _listView;
 }
 
 bool DocumentListController::offers(DocumentListAction action, FolderEntryKind kind) const
@@ -205,8 +220,17 @@ bool DocumentListController::rowHeld(ui::ListView& list, std::size_t index)
             peeked->openFromPeek(url, kind);
     };
     const auto title = _listView->row(index).title;
-    presentViewController(DocumentPeek::make(title, screen, menuForRow(list, index), open), true);
+    const auto peek = DocumentPeek::make(title, screen, menuForRow(list, index), open);
+    _peek = peek;
+    presentViewController(peek, true);
     return true;
+}
+
+void DocumentListController::heldRowPressedOn(ui::ListView&)
+{
+    const auto peek = _peek.lock();
+    if (peek && presentedViewController() == peek)
+        peek->press(peek->preferredAction());
 }
 
 void DocumentListController::openFromPeek(const Url& url, FolderEntryKind kind)

@@ -88,6 +88,9 @@ void DocumentListController::loadView()
     _placeholder->setHidden(true);
     fill(*view, _listView);
     fill(*view, _placeholder);
+    _rowAnchor = std::make_shared<ui::View>();
+    _rowAnchor->setHidden(true);
+    view->addSubview(_rowAnchor);
     setView(view);
 }
 

@@ -20,6 +20,7 @@ namespace platform {
 class FolderListing;
 }
 namespace platform::ui {
+class AlertController;
 class ListView;
 } // namespace platform::ui
 
@@ -122,6 +123,7 @@ private:
     void refreshRequested(ui::ListView& list) override;
     bool rowCommand(ui::ListView& list, std::size_t index, ui::RowCommand command) override;
     bool rowHeld(ui::ListView& list, std::size_t index) override;
+    void heldRowPressedOn(ui::ListView& list) override;
     void selectionRequested(ui::ListView& list) override;
 
     std::shared_ptr<DocumentListController> self();
@@ -136,14 +138,18 @@ private:
     void reportRemovalIfShown();
     void open(const Url& url, FolderEntryKind kind);
     void perform(DocumentListAction action, const Url& url);
+    /// The place of an item's row, for what points there; the list's when the row is not seen.
+    std::shared_ptr<ui::View> anchorFor(const Url& url);
     void openFromPeek(const Url& url, FolderEntryKind kind);
     /// Whether an item may be done something to: the action is enabled, and its kind of item has it.
     bool offers(DocumentListAction action, FolderEntryKind kind) const;
 
     std::optional<Url> _presentedURL;
+    std::weak_ptr<ui::AlertController> _peek; ///< the latest
     std::weak_ptr<DocumentListControllerDelegate> _delegate;
     std::shared_ptr<ui::ListView> _listView;
     std::shared_ptr<PlaceholderView> _placeholder;
+    std::shared_ptr<ui::View> _rowAnchor; ///< never seen
     std::shared_ptr<DocumentRowSource> _rows;
     std::shared_ptr<FolderContents> _contents;
     std::shared_ptr<DocumentSearch> _search;

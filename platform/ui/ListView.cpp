@@ -232,6 +232,12 @@ bool ListView::holdRow(std::size_t index)
         && delegate->rowHeld(*this, index);
 }
 
+void ListView::pressOnHeldRow()
+{
+    if (const auto delegate = _listDelegate.lock())
+        delegate->heldRowPressedOn(*this);
+}
+
 std::optional<std::size_t> ListView::rowBeginningWith(std::string_view text, std::size_t from) const
 {
     const auto source = _dataSource.lock();

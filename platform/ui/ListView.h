@@ -59,6 +59,7 @@ public:
     Menu menuForList();
     bool commandRow(std::size_t index, RowCommand command);
     bool holdRow(std::size_t index);
+    void pressOnHeldRow(); ///< the finger that held a row is still there, and means it
     /// The row that what was typed leads to, see ListViewDataSource::rowBeginningWith().
     std::optional<std::size_t> rowBeginningWith(std::string_view text, std::size_t from) const;
     void pulledToRefresh();

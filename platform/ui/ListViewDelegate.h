@@ -39,6 +39,8 @@ public:
     /// A row is held: show what it has to say, over the list. False: there is nothing, and the row's menu
     /// is shown instead.
     virtual bool rowHeld(ListView&, std::size_t /*index*/) { return false; }
+    /// The finger that held a row presses on: open what the row showed.
+    virtual void heldRowPressedOn(ListView&) { }
 };
 
 } // namespace platform::ui
