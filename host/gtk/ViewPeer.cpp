@@ -120,8 +120,12 @@ void ViewPeer::mirror(View& shown, ViewChanges changes)
         gtk_widget_set_visible(_canvas.get(), !shown.isHidden());
         gtk_widget_set_opacity(_canvas.get(), shown.alpha());
     }
-    if (changes.contains(ViewChange::Enabled))
+    if (changes.contains(ViewChange::Enabled)) {
         gtk_widget_set_sensitive(_canvas.get(), shown.isEnabled());
+        // Assistive technology hears of it from the native widget alone.
+        if (_native)
+            gtk_widget_set_sensitive(_native.get(), shown.isEnabled());
+    }
     if (changes.contains(ViewChange::Style) || changes.contains(ViewChange::Display))
         gtk_widget_queue_draw(_canvas.get());
     if (changes.contains(ViewChange::Accessibility))
