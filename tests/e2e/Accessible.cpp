@@ -51,6 +51,20 @@ std::string Accessible::text() const
     return answer;
 }
 
+Place Accessible::middle() const
+{
+    auto* component = atspi_accessible_get_component_iface(_node.get());
+    if (!component)
+        return {};
+    auto* extents = atspi_component_get_extents(component, ATSPI_COORD_TYPE_WINDOW, nullptr);
+    Place answer;
+    if (extents)
+        answer = {extents->x + extents->width / 2.0, extents->y + extents->height / 2.0};
+    g_free(extents);
+    g_object_unref(component);
+    return answer;
+}
+
 bool Accessible::hasRole(AtspiRole role) const
 {
     return atspi_accessible_get_role(_node.get(), nullptr) == role;

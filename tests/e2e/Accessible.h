@@ -10,6 +10,11 @@
 
 namespace e2e {
 
+/// A place in the program's window, which begins at the corner of its display; pixels.
+struct Place {
+    double x = 0, y = 0;
+};
+
 /// A node of the accessibility tree.
 class Accessible {
 public:
@@ -37,6 +42,7 @@ public:
     bool isSensitive() const { return hasState(ATSPI_STATE_SENSITIVE); }
     /// The content of a text.
     std::string text() const;
+    Place middle() const;
     /// Replaces the text of an entry; false when it takes none.
     bool enter(const std::string& text) const;
 

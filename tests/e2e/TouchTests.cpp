@@ -1,0 +1,155 @@
+#include "DriveTests.h"
+#include "TouchScreen.h"
+
+#include <gmock/gmock.h>
+
+namespace e2e {
+namespace {
+
+constexpr double width = 360, height = 720; ///< of the display
+
+/// All by fingers on a touch screen, in a window as small as a phone.
+class TouchTests : public DriveTests {
+protected:
+    void SetUp() override
+    {
+        DriveTests::SetUp();
+        environment["DISPLAY"] = getenv("TRW_TOUCH_DISPLAY");
+        ASSERT_TRUE(screen().isConnected());
+        start();
+        EXPECT_TRUE(eventually([this] { return program->shows("Documents"); }));
+    }
+    void TearDown() override
+    {
+        screen().liftAll();
+        DriveTests::TearDown();
+    }
+
+    /// The server takes one connection for its life.
+    static TouchScreen& screen()
+    {
+        static TouchScreen fingers(getenv("TRW_TOUCH_SOCKET"), width, height);
+        return fingers;
+    }
+    /// The middle of the frontmost button whose name begins so, once it stands still.
+    Place placeOf(const std::string& beginning)
+    {
+        Place place;
+        EXPECT_TRUE(eventually([&] {
+            const auto found = program->buttons(beginning);
+            const auto last = place;
+            place = found.empty() ? Place() : found.back().middle();
+            return place.x > 0 && place.x < width && place.x == last.x && place.y == last.y;
+        })) << beginning;
+        return place;
+    }
+    void tap(const std::string& beginning) { screen().tap(placeOf(beginning)); }
+    void expectShown(const std::string& beginning)
+    {
+        EXPECT_TRUE(eventually([&] { return program->shows(beginning); })) << beginning;
+    }
+    void expectGone(const std::string& beginning)
+    {
+        EXPECT_TRUE(eventually([&] { return !program->shows(beginning); })) << beginning;
+    }
+};
+
+TEST_F(TouchTests, AFingerThatMovesOpensNothingAndASwipeGoesBack)
+{
+    tap("Documents");
+    expectShown("Household");
+    const auto [x, y] = placeOf("Letters");
+    const TouchScreen::Path strays[] = {
+        {{x, y}, {x, y - 100}}, {{x, y}, {x, y + 250}}, {{x + 100, y}, {x - 60, y}}};
+    for (const auto& path : strays) {
+        screen().flick(path);
+        screen().drag(path);
+    }
+    // Begun and taken back: the screen stays.
+    screen().draw({{{x, y}, {x + 150, y}}});
+    screen().move(0, {x, y});
+    screen().lift(0);
+    expectShown("Household");
+    EXPECT_EQ(placeOf("Letters").x, x);
+    screen().drag({{x - 100, y}, {x + 150, y}});
+    expectShown("Notebook");
+    EXPECT_TRUE(eventually([this] { return !program->shows("Back"); }));
+}
+
+TEST_F(TouchTests, AHeldFingerPeeksAndPressesOn)
+{
+    screen().put(0, placeOf("Notebook"));
+    expectShown("Open");
+    screen().lift(0);
+    expectShown("Open");
+    screen().tap({width / 2, 30});
+    expectGone("Open");
+    expectShown("Documents");
+    EXPECT_FALSE(program->shows("Back")) << "the finger that put the peek away opened something";
+
+    screen().put(0, placeOf("Documents"));
+    expectShown("Open");
+    expectShown("Back");
+    screen().lift(0);
+    expectShown("Household");
+    EXPECT_TRUE(program->dialogs().empty());
+}
+
+TEST_F(TouchTests, AFingerAlongTheMarksSelectsARange)
+{
+    tap("Documents");
+    tap("Select");
+    expectShown("Cancel");
+    const double mark = 25;
+    screen().drag({{mark, placeOf("Household").y}, {mark, placeOf("Letters").y}});
+    EXPECT_TRUE(eventually([this] { return program->says("3 Items Selected"); }));
+    screen().drag({{mark, placeOf("Household").y}, {mark, placeOf("Ideas for later").y}});
+    EXPECT_TRUE(eventually([this] { return program->says("1 Item Selected"); }));
+    tap("Letters");
+    EXPECT_TRUE(eventually([this] { return program->says("Select Items"); }));
+}
+
+TEST_F(TouchTests, ATapBesideClosesWhatLiesOverTheScreen)
+{
+    const auto outside = placeOf("Sketchbook");
+    tap("Order and Options");
+    expectShown("Name");
+    screen().tap(outside);
+    expectGone("Name");
+    EXPECT_FALSE(program->shows("Back"));
+}
+
+TEST_F(TouchTests, TwoFingersZoomAPicture)
+{
+    tap("Photos");
+    tap("Biscuit the cat.png");
+    const auto canZoomOut = [this] {
+        const auto buttons = program->buttons("Smaller");
+        return !buttons.empty() && buttons.back().isSensitive();
+    };
+    expectShown("Smaller");
+    const Place middle{width / 2, height / 2};
+    EXPECT_FALSE(canZoomOut());
+    screen().draw({{{middle.x - 30, middle.y}, {middle.x - 120, middle.y}},
+        {{middle.x + 30, middle.y}, {middle.x + 120, middle.y}}});
+    screen().liftAll();
+    EXPECT_TRUE(eventually(canZoomOut));
+    screen().tap(middle);
+    screen().tap(middle);
+    EXPECT_TRUE(eventually([&] { return !canZoomOut(); }));
+}
+
+TEST_F(TouchTests, AListMayChangeUnderAFinger)
+{
+    tap("Desktop");
+    const auto place = placeOf("Packing list.md");
+    screen().put(0, place);
+    std::ofstream(top / "Desktop/A first one.txt") << "new";
+    EXPECT_TRUE(eventually([&] { return placeOf("Packing list.md").y > place.y; }));
+    screen().lift(0);
+    // What the finger was put on, wherever it is now.
+    EXPECT_TRUE(eventually([this] { return program->document().find("sweater") != std::string::npos; }));
+}
+
+} // namespace
+} // namespace e2e
