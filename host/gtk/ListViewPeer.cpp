@@ -5,6 +5,7 @@
 #include "host/gtk/RowModel.h"
 
 #include <algorithm>
+#include <cmath>
 
 namespace host::gtk {
 
