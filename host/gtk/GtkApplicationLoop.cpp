@@ -181,6 +181,7 @@ int GtkApplicationLoop::runPrimary(char** argv, const CommandLine& line)
                   << '\n';
         return EX_UNAVAILABLE;
     }
+    Theme::registerResources();
     int flags = G_APPLICATION_HANDLES_OPEN;
     if (line.mode == CommandLine::Mode::Service)
         flags |= G_APPLICATION_IS_SERVICE;

@@ -233,8 +233,11 @@ void ListViewPeer::fillSoon(GtkListItem* item)
 {
     const auto list = _list.lock();
     // Between two splices of one change a place is not that of the row.
-    if (list && !_isSplicing && isSeen(*list, gtk_list_item_get_position(item)))
-        return bindRow(item);
+    if (list && !_isSplicing && isSeen(*list, gtk_list_item_get_position(item))) {
+        bindRow(item);
+        context().firstList().note(_listWidget);
+        return;
+    }
     if (list)
         ListRowWidget::reserve(gtk_list_item_get_child(item), list->rowHeight());
     _unfilled.insert(item);

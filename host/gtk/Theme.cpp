@@ -5,6 +5,8 @@
 #include <adwaita.h>
 
 #include <algorithm>
+#include <memory>
+#include <mutex>
 #include <string>
 
 extern "C" void trw_resources_register_resource();
@@ -21,6 +23,10 @@ constexpr double defaultDpi = 96;
 /// Of the text colour. Grey text must stand out from its background by 4.5 to 1, with high contrast by 7
 /// to 1.
 constexpr float greyShare = 0.7F, strongGreyShare = 0.9F, lightGreyShare = 0.4F;
+/// The share of a row's second line in the style sheet: each further size would be one more font to find,
+/// which takes milliseconds of the start, and smaller ones are hard to read.
+constexpr double smallestShare = 0.85;
+constexpr auto iconsPath = "/app/tarrow/Drive/icons";
 
 GdkRGBA plain(const Color& color)
 {
@@ -46,7 +52,21 @@ const char* themeName(const Color& color, ColorUse use)
 double relativeSize(double pointSize)
 {
     const double ratio = pointSize / bodyPointSize;
-    return ratio >= 1 ? ratio : (1 + ratio) / 2;
+    return ratio >= 1 ? ratio : std::max((1 + ratio) / 2, smallestShare);
+}
+
+/// The application has added its icons by the path of its identifier. To add them again would drop the icon
+/// theme that the toolkit has read on another thread meanwhile, and read it anew on this one.
+void addIcons(GtkIconTheme* icons)
+{
+    const std::unique_ptr<char*, decltype(&g_strfreev)> paths(
+        gtk_icon_theme_get_resource_path(icons), g_strfreev);
+    const std::string ours(iconsPath);
+    for (char** path = paths.get(); path && *path; ++path) {
+        if (*path == ours || *path == ours + '/')
+            return;
+    }
+    gtk_icon_theme_add_resource_path(icons, iconsPath);
 }
 
 /// Icons and style sheet of our own, once for the process's display.
@@ -57,8 +77,7 @@ void installResources()
     if (isInstalled || !display)
         return;
     isInstalled = true;
-    trw_resources_register_resource();
-    gtk_icon_theme_add_resource_path(gtk_icon_theme_get_for_display(display), "/app/tarrow/Drive/icons");
+    addIcons(gtk_icon_theme_get_for_display(display));
     const auto provider = ObjectRef<GtkCssProvider>::adopt(gtk_css_provider_new());
     gtk_css_provider_load_from_resource(provider.get(), "/app/tarrow/Drive/kit.css");
     gtk_style_context_add_provider_for_display(
@@ -75,8 +94,15 @@ double settingsDpi()
 
 } // namespace
 
+void Theme::registerResources()
+{
+    static std::once_flag once;
+    std::call_once(once, trw_resources_register_resource);
+}
+
 Theme::Theme()
 {
+    registerResources();
     installResources();
     auto* style = adw_style_manager_get_default();
     for (const char* signal : {"notify::dark", "notify::high-contrast"})

@@ -22,6 +22,10 @@ public:
     Theme();
     ~Theme();
 
+    /// Makes the program's icons and style sheet known to the toolkit: before the application is registered,
+    /// which then finds the icons by itself. Cheap to call again.
+    static void registerResources();
+
     /// A colour of the model as the theme has it: the standard colours follow light, dark and high contrast,
     /// others stay what they are.
     GdkRGBA resolve(const platform::Color& color, ColorUse use) const;
