@@ -276,8 +276,11 @@ void GtkApplicationLoop::launch(std::optional<ShortcutItem> shortcut)
     gtk_widget_set_default_direction(
         platform::services().localization().isRightToLeft() ? GTK_TEXT_DIR_RTL : GTK_TEXT_DIR_LTR);
     auto size = storedSize(_stateFile);
-    // A browser's page is the whole screen of its window.
-    size.isMaximized = size.isMaximized || _broadway;
+    if (_broadway) {
+        // A browser's page is the whole screen of its window: nothing would bring it back from an icon.
+        size.isMaximized = true;
+        g_object_set(gtk_settings_get_default(), "gtk-decoration-layout", ":", nullptr);
+    }
     _windowHost = std::make_shared<GtkWindowHost>(_application.get(), size, _settings.previews);
     _windowHost->setOnShow([this](WindowPeer& window) { windowShown(window); });
     platform::ui::WindowHost::install(_windowHost);

@@ -22,6 +22,20 @@ GtkWidget* makeIconButton(const char* icon, const std::string& name)
     return button;
 }
 
+/// The desktop's own window buttons with only the one that closes, where the desktop has it; a phone has
+/// none.
+std::string closeButtonOnly()
+{
+    char* layout = nullptr;
+    g_object_get(gtk_settings_get_default(), "gtk-decoration-layout", &layout, nullptr);
+    const std::string all = layout ? layout : "";
+    g_free(layout);
+    const auto close = all.find("close");
+    if (close == std::string::npos)
+        return ":";
+    return close < all.find(':') ? "close:" : ":close";
+}
+
 /// A key that presses a button wherever the keyboard is, as long as the button is shown.
 void addShortcut(GtkWidget* button, guint key, GdkModifierType modifiers = static_cast<GdkModifierType>(0))
 {
@@ -128,7 +142,8 @@ void NavigationBarPeer::setNarrow(bool narrow)
     _isNarrow = narrow;
     for (const auto& peer : _peers)
         peer->setNarrow(narrow);
-    adw_header_bar_set_decoration_layout(ADW_HEADER_BAR(widget()), narrow ? ":close" : nullptr);
+    adw_header_bar_set_decoration_layout(
+        ADW_HEADER_BAR(widget()), narrow ? closeButtonOnly().c_str() : nullptr);
 }
 
 void NavigationBarPeer::setWindowButtons(bool shown)
