@@ -74,6 +74,7 @@ void PreviewController::beginEditing()
     if (_editor || _isEditingWanted || !canEdit())
         return;
     _isEditingWanted = true;
+    _lastNavigation = navigationController();
     PreviewEditing::begin(
         *_item, [weak = std::weak_ptr(self()), generation = _generation](const auto& begun) {
             const auto screen = weak.lock();
@@ -341,11 +342,11 @@ void PreviewController::programEnds()
 /// Over what is on the screen now, which may be another one by the time that something has gone wrong.
 void PreviewController::alert(const std::shared_ptr<ui::ViewController>& alert)
 {
-    const auto navigation = _lastNavigation.lock();
-    if (isVisible() || !navigation)
-        presentViewController(alert, true);
+    const auto own = navigationController();
+    if (const auto navigation = own ? own : _lastNavigation.lock())
+        navigation->presentViewController(alert, true);
     else
-        navigation->topViewController()->presentViewController(alert, true);
+        presentViewController(alert, true);
 }
 
 } // namespace platform::components

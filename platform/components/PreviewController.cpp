@@ -113,7 +113,6 @@ void PreviewController::viewWillAppear(bool animated)
 void PreviewController::viewDidAppear(bool animated)
 {
     ViewController::viewDidAppear(animated);
-    _lastNavigation = navigationController();
     if (_content)
         startDownload();
 }

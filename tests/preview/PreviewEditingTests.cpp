@@ -1,0 +1,286 @@
+#include "PreviewFixture.h"
+#include "platform/FileSystem.h"
+#include "platform/PagedDocumentEditing.h"
+#include "platform/components/PreviewContent.h"
+#include "platform/components/PreviewEditor.h"
+#include "platform/components/PreviewFieldBar.h"
+#include "platform/components/PreviewPagesView.h"
+#include "platform/components/PreviewScreenView.h"
+#include "platform/components/PreviewToolbar.h"
+#include "platform/ui/AlertController.h"
+#include "platform/ui/Button.h"
+#include "platform/ui/TextField.h"
+#include "tests/support/FormPdf.h"
+#include "tests/support/SimplePdf.h"
+
+#include <gmock/gmock.h>
+
+#include <sys/stat.h>
+
+#include <filesystem>
+#include <fstream>
+
+namespace {
+
+namespace fs = std::filesystem;
+
+using namespace platform;
+using namespace platform::components;
+using platform::ui::AlertController;
+using tarrow::DRItem;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using testing::Not;
+using testing::SizeIs;
+using testing_support::formPdf;
+
+class PreviewEditingTest : public testing_support::PreviewFixture {
+protected:
+    void show(const std::string& content, const char* name = "Form.pdf")
+    {
+        item = drive.writeDocument(name, content);
+        manager->previewItem(DRItem::initWithURL(item));
+        drive.dispatch->runUntilIdle();
+    }
+    void edit()
+    {
+        preview->screenView()->toolbar()->editButton()->press();
+        drive.dispatch->runUntilIdle();
+    }
+    PreviewPagesView& pages() const { return dynamic_cast<PreviewPagesView&>(*preview->previewView()); }
+    void press(EditTool tool)
+    {
+        ASSERT_TRUE(preview->editor());
+        preview->editor()->bar()->button(tool)->press();
+        drive.dispatch->runUntilIdle();
+    }
+    /// Writes a text into the first field.
+    void write(const std::string& text)
+    {
+        press(EditTool::NextField);
+        ASSERT_TRUE(preview->editor()->fieldBar()->textField()->userEdited(text, {}));
+    }
+    void writeAndLeave(const std::string& text)
+    {
+        show(formPdf());
+        edit();
+        write(text);
+        navigation->popViewController(false);
+        drive.dispatch->runUntilIdle();
+    }
+    std::shared_ptr<AlertController> alert() const
+    {
+        return std::dynamic_pointer_cast<AlertController>(navigation->presentedViewController());
+    }
+    void answer(const std::string& title)
+    {
+        const auto asked = alert();
+        ASSERT_TRUE(asked);
+        const auto action =
+            std::ranges::find_if(asked->actions(), [&](const auto& each) { return each->title() == title; });
+        ASSERT_NE(action, asked->actions().end()) << title;
+        asked->press(*action);
+        drive.dispatch->runUntilIdle();
+    }
+    static std::string contentOf(const Url& url)
+    {
+        std::ifstream file(url.path(), std::ios::binary);
+        return {std::istreambuf_iterator<char>(file), {}};
+    }
+    /// What the first field of a document on the disk holds.
+    static std::string written(const Url& url)
+    {
+        const auto opened = services().pagedDocumentOpener().openForEditing(
+            std::make_shared<const std::string>(contentOf(url)));
+        return opened ? (*opened.value)->fields(0)[0].text : "unreadable";
+    }
+
+    Url item = drive.url("Form.pdf");
+};
+
+TEST_F(PreviewEditingTest, OffersItWhereDelegateAndDocumentAllowItAndSaysWhyNotOtherwise)
+{
+    const auto isOffered = [&] { return !preview->screenView()->toolbar()->editButton()->isHidden(); };
+    show(formPdf());
+    EXPECT_TRUE(isOffered());
+    show("text", "Notes.txt");
+    EXPECT_FALSE(isOffered());
+    // The content is one, but not the name, which the delegate goes by.
+    show(formPdf(), "Form.ai");
+    EXPECT_FALSE(preview->canEdit());
+
+    show(testing_support::simplePdf({"no index"}), "Damaged.pdf");
+    edit();
+    EXPECT_FALSE(preview->editor());
+    ASSERT_TRUE(alert());
+    EXPECT_THAT(alert()->message(), HasSubstr("damaged"));
+    answer("OK");
+    show(formPdf(), "Fixed.pdf");
+    ::chmod(item.path().c_str(), 0444);
+    edit();
+    EXPECT_FALSE(preview->editor());
+    ASSERT_TRUE(alert());
+    EXPECT_THAT(alert()->message(), HasSubstr("permission"));
+}
+
+TEST_F(PreviewEditingTest, SavesWhenThePersonIsDoneAndGoesOnShowingThePlace)
+{
+    show(formPdf());
+    pages().userResized(224, 1);
+    pages().setZoom(2);
+    pages().userSees({0, 300, 224, 300});
+    edit();
+    EXPECT_TRUE(preview->screenView()->toolbar()->isHidden());
+    EXPECT_THAT(pages().fields(), SizeIs(5));
+    write("Ada");
+    EXPECT_EQ(preview->editor()->fieldBar()->nameLabel()->text(), "Your name");
+    const auto box = pages().fields()[1];
+    pages().userTaps(pages().deck().toContent(0, box.place).origin());
+    drive.dispatch->runUntilIdle();
+    EXPECT_TRUE(pages().fields()[1].isOn);
+    EXPECT_EQ(contentOf(item), formPdf()) << "before it is done";
+    press(EditTool::Done);
+    EXPECT_FALSE(preview->editor());
+    EXPECT_FALSE(preview->screenView()->toolbar()->isHidden());
+    EXPECT_EQ(written(item), "Ada");
+
+    // The presenter hears of the save, but what is shown is that very content.
+    const auto shown = preview->content();
+    drive.dispatch->advance(3);
+    EXPECT_EQ(preview->content(), shown);
+    EXPECT_EQ(pages().zoom(), 2);
+    EXPECT_EQ(pages().visiblePlace(), (Point{0, 300}));
+    edit();
+    EXPECT_EQ(pages().fields()[0].text, "Ada");
+    press(EditTool::Done);
+    EXPECT_EQ(alert(), nullptr);
+}
+
+TEST_F(PreviewEditingTest, TakesBackMarksAndNotesAndReadsThem)
+{
+    show(formPdf());
+    pages().userResized(224, 1);
+    pages().userSees({0, 0, 224, 400});
+    const auto at = [&](double x, double y) { return pages().deck().toContent(0, {x, y, 0, 0}).origin(); };
+    const auto tap = [&](Point place) {
+        pages().userTaps(place);
+        drive.dispatch->runUntilIdle();
+    };
+    tap(at(170, 270));
+    ASSERT_TRUE(alert());
+    EXPECT_EQ(alert()->message(), "Seen by Ada") << "also where nothing is being changed";
+    answer("OK");
+    edit();
+    EXPECT_FALSE(preview->editor()->bar()->button(EditTool::Highlight)->isEnabled());
+    pages().userSelects(at(31, 255), at(120, 255));
+    drive.dispatch->runUntilIdle();
+    press(EditTool::Highlight);
+    press(EditTool::Note);
+    EXPECT_THAT(preview->screenView()->note(), HasSubstr("Tap"));
+    tap(at(100, 150));
+    ASSERT_TRUE(alert());
+    EXPECT_TRUE(alert()->textFields().front()->userEdited("mine", {}));
+    answer("Done");
+    tap(at(100, 150));
+    EXPECT_EQ(alert()->message(), "mine");
+    answer("Change Text");
+    EXPECT_TRUE(alert()->textFields().front()->userEdited("ours", {}));
+    answer("Done");
+    const auto marks = [&] { return preview->editor()->editing()->pages()->marks(0); };
+    ASSERT_THAT(marks(), SizeIs(3));
+    EXPECT_EQ(marks()[2].text, "ours");
+    tap(at(60, 255));
+    answer("Remove");
+    EXPECT_THAT(marks(), SizeIs(2));
+    for (const std::size_t count : {3U, 3U, 2U, 1U}) {
+        press(EditTool::Undo);
+        EXPECT_THAT(marks(), SizeIs(count));
+    }
+    EXPECT_FALSE(preview->editor()->editing()->hasUnsavedEdits());
+    press(EditTool::Done);
+    EXPECT_EQ(contentOf(item), formPdf());
+}
+
+TEST_F(PreviewEditingTest, LeavingSavesAndNeverReplacesWhatAnotherProgramWrote)
+{
+    writeAndLeave("Ada");
+    EXPECT_EQ(written(item), "Ada");
+    EXPECT_FALSE(alert());
+
+    show(formPdf());
+    edit();
+    write("Bob");
+    const auto theirs = testing_support::simplePdf({"theirs"});
+    drive.writeDocument("Form.pdf", theirs);
+    preview->refreshCurrentPreviewItem();
+    drive.dispatch->runUntilIdle();
+    EXPECT_TRUE(preview->editor()) << "what is being changed is not taken away";
+    EXPECT_THAT(preview->screenView()->note(), HasSubstr("copy"));
+    press(EditTool::Done);
+    EXPECT_EQ(contentOf(item), theirs);
+    EXPECT_EQ(written(drive.url("Form 2.pdf")), "Bob");
+    ASSERT_TRUE(alert());
+    EXPECT_THAT(alert()->message(), HasSubstr("Form 2.pdf"));
+    EXPECT_EQ(preview->content()->pages->pageCount(), 1U) << "theirs is shown";
+}
+
+TEST_F(PreviewEditingTest, AFailedSaveLosesNothing)
+{
+    show(formPdf());
+    edit();
+    write("Ada");
+    ::chmod(item.path().c_str(), 0444);
+    navigation->popViewController(false);
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(contentOf(item), formPdf());
+    ASSERT_TRUE(alert()) << "over the screen that is shown by now";
+    EXPECT_THAT(alert()->message(), HasSubstr("permission"));
+    answer("Try Again");
+    ASSERT_TRUE(alert());
+    ::chmod(item.path().c_str(), 0644);
+    answer("Try Again");
+    EXPECT_FALSE(alert());
+    EXPECT_EQ(written(item), "Ada");
+
+    for (const char* choice : {"Keep a Copy", "Discard Changes"}) {
+        show(formPdf());
+        edit();
+        write("Bob");
+        fs::remove(item.path());
+        press(EditTool::Done);
+        ASSERT_TRUE(alert());
+        answer(choice);
+        const bool isKept = fs::exists(item.path());
+        EXPECT_EQ(isKept, std::string_view(choice) == "Keep a Copy");
+        EXPECT_EQ(isKept ? written(item) : "Bob", "Bob");
+        navigation->dismissViewController(false);
+        navigation->popViewController(false);
+        drive.dispatch->runUntilIdle();
+    }
+}
+
+TEST_F(PreviewEditingTest, FollowsAMoveAndSavesWhereTheProgramIsLeftOrEnds)
+{
+    show(formPdf());
+    edit();
+    write("Ada");
+    const auto moved = drive.url("Moved.pdf");
+    fs::rename(item.path(), moved.path());
+    manager->presentedItemDidMoveToURL(moved);
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(written(moved), "Ada");
+    EXPECT_FALSE(fs::exists(item.path()));
+
+    show(formPdf());
+    edit();
+    write("Ada");
+    drive.notifications->post(Notification::ApplicationWillResignActive);
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(written(item), "Ada");
+    EXPECT_TRUE(preview->editor());
+    preview->editor()->fieldBar()->textField()->userEdited("Bob", {});
+    drive.notifications->post(Notification::ApplicationWillTerminate);
+    EXPECT_EQ(written(item), "Bob") << "without any queue";
+}
+
+} // namespace
