@@ -4,6 +4,7 @@
 //
 // The folder is made under TMPDIR (/tmp). Run on an idle machine; the list uses all cores, the floor one.
 
+#include "ListedFolders.h"
 #include "host/system/DirectoryReader.h"
 #include "host/system/EntryClassifier.h"
 #include "host/system/GLibDispatch.h"
@@ -16,69 +17,18 @@
 #include <fcntl.h>
 #include <sys/stat.h>
 
-#include <algorithm>
 #include <chrono>
-#include <cstdlib>
-#include <filesystem>
-#include <map>
-#include <random>
+#include <vector>
 
 namespace {
 
-using Clock = std::chrono::steady_clock;
+using bench::Clock;
+using bench::folders;
+using bench::median;
+using bench::milliseconds;
 using host::system::DirectoryReader;
 using platform::FolderSnapshot;
 using platform::ListingStage;
-
-double milliseconds(Clock::duration duration)
-{
-    return std::chrono::duration<double, std::milli>(duration).count();
-}
-
-/// Folders of documents with ordinary names, made once for each size and removed at the end.
-class Folders {
-public:
-    ~Folders()
-    {
-        for (const auto& [size, path] : _paths)
-            std::filesystem::remove_all(path);
-    }
-    const std::string& ofSize(int size)
-    {
-        auto& path = _paths[size];
-        if (path.empty())
-            path = make(size);
-        return path;
-    }
-
-private:
-    static std::string make(int size)
-    {
-        auto pattern = (std::filesystem::temp_directory_path() / "tarrow-bench-XXXXXX").string();
-        if (!mkdtemp(pattern.data()))
-            std::abort();
-        static constexpr const char* stems[] = {
-            "Invoice", "Minutes of the meeting", "IMG_", "Résumé", "photo"};
-        static constexpr const char* extensions[] = {".pdf", ".txt", ".jpg", ".docx", ""};
-        std::mt19937 random(1);
-        for (int i = 0; i < size; ++i) {
-            const auto name = pattern + '/' + stems[random() % 5] + ' ' + std::to_string(random() % 1'000'000)
-                + ' ' + std::to_string(i) + extensions[random() % 5];
-            if (i % 20 == 0)
-                ::mkdir(name.c_str(), 0700);
-            else
-                ::close(::open(name.c_str(), O_CREAT | O_WRONLY | O_CLOEXEC, 0600));
-        }
-        return pattern;
-    }
-    std::map<int, std::string> _paths;
-};
-
-Folders& folders()
-{
-    static Folders instance;
-    return instance;
-}
 
 double floorOnce(const std::string& path)
 {
@@ -115,12 +65,6 @@ ListTimes listOnce(host::system::ThreadedFolderLister& lister, const std::string
     while (times.complete == 0)
         g_main_context_iteration(nullptr, TRUE);
     return times;
-}
-
-double median(std::vector<double> values)
-{
-    std::ranges::sort(values);
-    return values[values.size() / 2];
 }
 
 void listFolder(benchmark::State& state)

@@ -422,9 +422,11 @@ void ListViewPeer::rowsDidChange(ui::ListView& list, const ui::ListChanges& chan
 void ListViewPeer::splice(const ui::ListView& list, const ui::ListChanges& changes)
 {
     _isSplicing = true;
-    for (const auto& splice : splicesToTell(list.visibleRows(), changes))
+    for (const auto& splice : splicesToTell(list.visibleRows(), changes)) {
+        const auto leaving = rowObjects({splice.position, splice.removed});
         RowModel::splice(_rows.get(), static_cast<guint>(splice.position), static_cast<guint>(splice.removed),
-            static_cast<guint>(splice.inserted));
+            static_cast<guint>(splice.inserted), leaving);
+    }
     _isSplicing = false;
     for (auto* item : _live) {
         if (showsAnew(changes, gtk_list_item_get_position(item)))
@@ -432,6 +434,17 @@ void ListViewPeer::splice(const ui::ListView& list, const ui::ListChanges& chang
     }
     if (!_unfilled.empty())
         fillLater();
+}
+
+/// The objects of the rows in a range that have widgets.
+std::vector<ObjectRef<GObject>> ListViewPeer::rowObjects(const ui::RowRange& range) const
+{
+    std::vector<ObjectRef<GObject>> objects;
+    for (auto* item : _live) {
+        if (range.contains(gtk_list_item_get_position(item)))
+            objects.push_back(ObjectRef<GObject>::retain(G_OBJECT(gtk_list_item_get_item(item))));
+    }
+    return objects;
 }
 
 void ListViewPeer::rowDidChange(ui::ListView&, std::size_t index)

@@ -52,6 +52,7 @@ private:
     /// Lets the widgets know of as many rows as a frame can make widgets for, and of more in the next frames.
     void showRows(std::size_t count);
     void growRows();
+    std::vector<ObjectRef<GObject>> rowObjects(const platform::ui::RowRange& range) const;
     void splice(const platform::ui::ListView& list, const platform::ui::ListChanges& changes);
     /// Scrolls, at the latest after so many frames.
     void moveTo(double value, int frames);

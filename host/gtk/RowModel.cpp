@@ -5,6 +5,8 @@ namespace {
 struct TrwRowModel {
     GObject parent;
     guint count;
+    std::span<const host::gtk::ObjectRef<GObject>>
+        leaving; ///< items that may stand for rows that come; only during a splice
 };
 
 struct TrwRowModelClass {
@@ -28,7 +30,14 @@ guint itemCount(GListModel* model)
 
 gpointer item(GListModel* model, guint position)
 {
-    return position < rowsOf(model)->count ? g_object_new(G_TYPE_OBJECT, nullptr) : nullptr;
+    auto& leaving = rowsOf(model)->leaving;
+    if (position >= rowsOf(model)->count)
+        return nullptr;
+    if (leaving.empty())
+        return g_object_new(G_TYPE_OBJECT, nullptr);
+    auto* reused = leaving.front().get();
+    leaving = leaving.subspan(1);
+    return g_object_ref(reused);
 }
 
 void implementListModel(gpointer type, gpointer)
@@ -54,12 +63,15 @@ ObjectRef<GListModel> make()
     return ObjectRef<GListModel>::adopt(G_LIST_MODEL(g_object_new(trw_row_model_get_type(), nullptr)));
 }
 
-void splice(GListModel* model, guint position, guint removed, guint inserted)
+void splice(GListModel* model, guint position, guint removed, guint inserted,
+    std::span<const host::gtk::ObjectRef<GObject>> leaving)
 {
     if (removed == 0 && inserted == 0)
         return;
     rowsOf(model)->count = rowsOf(model)->count - removed + inserted;
+    rowsOf(model)->leaving = leaving;
     g_list_model_items_changed(model, position, removed, inserted);
+    rowsOf(model)->leaving = {};
 }
 
 void complete(GListModel* model, guint count)

@@ -53,6 +53,7 @@ private:
 
     Look look(const FileDescriptor& folder, const std::string& name) const;
     void place(std::uint32_t index, const FolderEntry& entry, Look& look);
+    bool isBefore(std::size_t index, std::size_t newcomer) const;
     std::size_t placeOf(std::size_t newcomer, std::size_t from) const;
     void takeOver(FolderSnapshot::Builder& builder, std::size_t from, std::size_t to);
 
@@ -64,6 +65,7 @@ private:
     std::vector<Stayed> _stayed; ///< likewise, and what they are now
     ListingBlock _newcomers;
     std::vector<std::size_t> _places; ///< of the newcomers, before which index of the list before
+    mutable std::vector<std::uint8_t> _key; ///< of the entry that is compared
     FolderRevision _revision;
     std::size_t _nextGone = 0, _nextStayed = 0;
 };
@@ -134,21 +136,29 @@ void Revising::sortNewcomers()
         _places.push_back(placeOf(i, _places.empty() ? 0 : _places.back()));
 }
 
+bool Revising::isBefore(std::size_t index, std::size_t newcomer) const
+{
+    const auto entry = _before.entry(index);
+    _key.clear();
+    ListingBlock::appendKey(entry, _tools.order, _grouping, _key);
+    return _newcomers.isAfter(entry, _key, newcomer);
+}
+
+/// Newcomers are often neighbours, so that the place is sought in growing steps first.
 std::size_t Revising::placeOf(std::size_t newcomer, std::size_t from) const
 {
-    std::vector<std::uint8_t> key;
-    std::size_t count = _before.count() - from;
-    while (count > 0) {
-        const auto half = count / 2;
-        const auto entry = _before.entry(from + half);
-        key.clear();
-        ListingBlock::appendKey(entry, _tools.order, _grouping, key);
-        if (_newcomers.isAfter(entry, key, newcomer)) {
-            from += half + 1;
-            count -= half + 1;
-        } else {
-            count = half;
-        }
+    std::size_t step = 1, end = from;
+    for (; end < _before.count() && isBefore(end, newcomer); step *= 2) {
+        from = end + 1;
+        end += step;
+    }
+    end = std::min(end, _before.count());
+    while (from < end) {
+        const auto half = from + (end - from) / 2;
+        if (isBefore(half, newcomer))
+            from = half + 1;
+        else
+            end = half;
     }
     return from;
 }
