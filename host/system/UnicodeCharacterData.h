@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/system/NameFolding.h"
 #include "platform/CharacterData.h"
 
 namespace host::system {
@@ -9,6 +10,13 @@ class UnicodeCharacterData : public platform::CharacterData {
 public:
     bool isIllegal(char32_t point) const override;
     bool isControlOrFormat(char32_t point) const override;
+    void appendFolded(std::string_view text, std::string& folded) const override
+    {
+        _folding.append(text, folded);
+    }
+
+private:
+    NameFolding _folding;
 };
 
 } // namespace host::system

@@ -1,5 +1,7 @@
 #include "platform/components/DocumentRows.h"
 
+#include "platform/components/NamePrefix.h"
+
 #include <algorithm>
 #include <functional>
 #include <limits>
@@ -20,11 +22,6 @@ ui::RowId idOfExtraItem(const Url& url)
 {
     // A library may have the name of a folder beside it.
     return ~std::hash<std::string>{}(url.path());
-}
-
-char folded(char c)
-{
-    return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
 }
 
 /// What a row shows of its entry beside the name, in one number.
@@ -165,11 +162,10 @@ ui::RowId DocumentRows::idFor(const Url& url) const
 
 std::optional<std::size_t> DocumentRows::rowBeginningWith(std::string_view text, std::size_t from) const
 {
-    const auto same = [](char a, char b) { return folded(a) == folded(b); };
+    NamePrefix prefix(text);
     for (std::size_t step = 0; step < count(); ++step) {
         const auto row = (from + step) % count();
-        const auto name = entry(row).name;
-        if (name.size() >= text.size() && std::equal(text.begin(), text.end(), name.begin(), same))
+        if (prefix.begins(entry(row).name))
             return row;
     }
     return std::nullopt;

@@ -50,8 +50,8 @@ public:
     /// The identifier that the row of an item has, whether it is there or not.
     ui::RowId idFor(const Url& url) const;
 
-    /// The first row at or after `from`, and then from the top, whose name begins with a text; capital and
-    /// small ASCII letters are the same.
+    /// The first row at or after `from`, and then from the top, whose name begins with a text,
+    /// whatever its case and accents. Main thread.
     std::optional<std::size_t> rowBeginningWith(std::string_view text, std::size_t from) const;
 
     /// The exact way from one state of a list to another; rows whose kind or promise changed count as

@@ -23,7 +23,7 @@ public:
     virtual RowId rowIdAtIndex(const ListView& list, std::size_t index) const = 0;
     virtual RowKind rowKindAtIndex(const ListView&, std::size_t /*index*/) const { return RowKind::Item; }
     /// For typing ahead: the first row at or after `from`, and then from the top, whose name begins with a
-    /// text, whatever its case; nothing when none does.
+    /// text, whatever its case and accents; nothing when none does.
     virtual std::optional<std::size_t> rowBeginningWith(
         const ListView&, std::string_view /*text*/, std::size_t /*from*/) const
     {

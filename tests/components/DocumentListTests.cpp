@@ -289,6 +289,34 @@ TEST_F(DocumentList, AHeldRowShowsItsScreenWithWhatCanBeDoneWithIt)
     EXPECT_FALSE(list->listView()->holdRow(1));
 }
 
+TEST_F(DocumentList, FindsRowsByWhatIsTypedInEveryScript)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    const HandLister::Entries entries{{"cafe.txt"}, {"Caf\u00e9 two"}, {"Cafe\u0301 three"},
+        {"\u041e\u0442\u0447\u0451\u0442 1"}, {"\u041e\u0442\u0447\u0435\u0442 2"}, {"\u00c9"},
+        {"\uff34\uff4f"}, {"no\xffutf8"}, {"x"}};
+    deliver(list, entries);
+    const struct {
+        const char* typed;
+        std::size_t from;
+        std::optional<std::size_t> found;
+    } rows[] = {
+        {"caf", 0, 0},
+        {"CAF\u00c9 T", 0, 1},
+        {"cafe th", 0, 2},
+        {"\u043e\u0442\u0447\u0435\u0442", 0, 3},
+        {"\u041e\u0422\u0427\u0401\u0422 2", 0, 4},
+        {"e", 0, 5},
+        {"\u00e9", 6, 5}, // from the top again
+        {"to", 0, 6},
+        {"no", 0, 7},
+        {"\u044f", 0, std::nullopt},
+        {"xx", 0, std::nullopt},
+    };
+    for (const auto& row : rows)
+        EXPECT_EQ(list->listView()->rowBeginningWith(row.typed, row.from), row.found) << row.typed;
+}
+
 TEST_F(DocumentList, SelectingByTheKeyboardAsksForEditMode)
 {
     const auto list = shownList(drive.makeFolder("Stuff"));

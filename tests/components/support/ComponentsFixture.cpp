@@ -80,6 +80,7 @@ ComponentsFixture::ComponentsFixture()
     coordinator = std::make_shared<CountingCoordinator>(_driveServices.fileCoordinator());
     _set.activityHandOver = drive.handOver;
     _set.appRegistry = apps;
+    _set.characterData = borrowed(_driveServices.characterData());
     _set.cloudDocumentService = drive.cloud;
     _set.documentSharing = sharing;
     _set.dispatch = drive.dispatch;
