@@ -38,6 +38,14 @@ GtkOrientation buttonOrientation(const ui::AlertController& alert)
     return isRow ? GTK_ORIENTATION_HORIZONTAL : GTK_ORIENTATION_VERTICAL;
 }
 
+/// The preferred action; without one, and in every sheet, the one that cancels.
+bool standsOut(const ui::AlertAction& action, const ui::AlertController& alert)
+{
+    const auto preferred = alert.preferredAction();
+    const bool mayCancel = !preferred || alert.alertStyle() == ui::AlertStyle::ActionSheet;
+    return preferred.get() == &action || (mayCancel && action.style() == ui::AlertActionStyle::Cancel);
+}
+
 void setText(GtkWidget* label, const std::string& text)
 {
     gtk_label_set_label(GTK_LABEL(label), text.c_str());
@@ -145,7 +153,7 @@ GtkWidget* AlertContent::makeActionButton(const std::shared_ptr<ui::AlertAction>
     gtk_widget_set_hexpand(button, TRUE);
     if (action->style() == ui::AlertActionStyle::Destructive)
         gtk_widget_add_css_class(button, "destructive");
-    if (action == alert.preferredAction() || action->style() == ui::AlertActionStyle::Cancel)
+    if (standsOut(*action, alert))
         gtk_widget_add_css_class(button, "preferred");
     const std::weak_ptr<ui::AlertAction> weak = action;
     _connections.push_back(connectSignal<void()>(button, "clicked", [alertOfButton = _alert, weak] {

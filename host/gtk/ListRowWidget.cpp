@@ -194,6 +194,8 @@ GtkWidget* showPart(TrwListRow* row, Part part, bool wanted)
 void trw_list_row_init(TrwListRow* row)
 {
     row->shown = new ui::ListRow();
+    // A name of many combining marks is higher than any row.
+    gtk_widget_set_overflow(GTK_WIDGET(row), GTK_OVERFLOW_HIDDEN);
 }
 
 void showTexts(TrwListRow* row, const ui::ListRow& content)

@@ -128,7 +128,7 @@ void describeContainers(SampleWriter& writer, const DriveLayout& layout)
         "org.inkscape.Inkscape");
     describe(recorder,
         library("Recorder", "Rekorder", "المسجل", {"public.audio", "public.movie"}, levels::none,
-            "audio-input-microphone"),
+            "audio-x-generic"),
         "org.gnome.SoundRecorder");
 }
 
