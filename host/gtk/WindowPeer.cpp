@@ -1,6 +1,7 @@
 #include "host/gtk/WindowPeer.h"
 
 #include "host/gtk/LayerFactory.h"
+#include "host/gtk/NoteNative.h"
 #include "host/gtk/PreviewNative.h"
 #include "platform/Localization.h"
 #include "platform/ui/ViewController.h"
@@ -40,6 +41,7 @@ WindowPeer::WindowPeer(AdwApplication* application, const std::shared_ptr<ui::Wi
     _theme->setReference(_window.get());
     _theme->setOnChange([this] { themeChanged(); });
     addPreviewMakers(*_context, previews);
+    addNoteMaker(*_context);
     _context->scheduler().attach(_window.get());
     ui::TextMeasurer::install(_measurer);
     connectWindow();

@@ -1,6 +1,7 @@
 #include "platform/components/PreviewEditor.h"
 
 #include "platform/Localization.h"
+#include "platform/components/NoteView.h"
 #include "platform/components/PreviewFieldBar.h"
 #include "platform/ui/AlertController.h"
 #include "platform/ui/Button.h"
@@ -241,7 +242,7 @@ void PreviewEditor::show(const FormField& field)
     const auto pages = _pages.lock();
     if (!pages)
         return;
-    const bool isText = field.kind == FormField::Kind::Text;
+    const bool isText = field.kind == FormField::Kind::Text && !field.isMultiline;
     _fieldBar->setField(field);
     if (std::exchange(_hasField, true) == false) {
         _fieldBar->setHidden(false);
@@ -305,6 +306,12 @@ void PreviewEditor::fillIn(const FormField& field)
     using Kind = FormField::Kind;
     if (field.kind == Kind::Choice)
         choose(field);
+    else if (field.isMultiline)
+        askForText(fieldName(field), field.text, [weak = weak_from_this(), field](const std::string& text) {
+            const auto editor = weak.lock();
+            if (editor && text != field.text)
+                editor->apply(FieldTextEdit{field.page, field.id, text});
+        });
     else if (field.kind == Kind::CheckBox)
         apply(FieldStateEdit{field.page, field.id, !field.isOn});
     else if (field.kind == Kind::RadioButton && !field.isOn)
@@ -387,20 +394,12 @@ void PreviewEditor::askForText(
     const std::string& title, const std::string& text, std::function<void(const std::string&)> written)
 {
     const auto alert = std::make_shared<ui::AlertController>(title, std::string(), ui::AlertStyle::Alert);
-    alert->addTextField([&](ui::TextField& field) {
-        field.setText(text);
-        field.setAccessibilityLabel(title);
-        field.setInputTraits(
-            {.returnKey = ui::ReturnKey::Done, .clearButton = ui::ClearButton::WhileEditing});
-    });
+    const auto screen = std::make_shared<NoteScreen>(title, text);
+    alert->setContentViewController(screen);
     alert->addAction(action(localized("Cancel"), ui::AlertActionStyle::Cancel));
     const auto done = action(localized("Done"), ui::AlertActionStyle::Default,
-        [weak = std::weak_ptr(alert), written = std::move(written)] {
-            if (const auto asked = weak.lock())
-                written(asked->textFields().front()->text());
-        });
+        [note = screen->note(), written = std::move(written)] { written(note->text()); });
     alert->addAction(done);
-    alert->setPreferredAction(done);
     _callbacks.present(alert);
 }
 

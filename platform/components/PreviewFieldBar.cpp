@@ -15,7 +15,7 @@ constexpr double margin = 8, nameHeight = 22;
 
 bool isWritten(const FormField& field)
 {
-    return field.kind == FormField::Kind::Text;
+    return field.kind == FormField::Kind::Text && !field.isMultiline;
 }
 
 /// The first characters of a text, as many as a field takes.
@@ -41,6 +41,8 @@ std::string fieldName(const FormField& field)
 
 std::string fieldValueWords(const FormField& field)
 {
+    if (field.isMultiline)
+        return field.text.empty() ? localized("Write…") : field.text.substr(0, field.text.find('\n'));
     if (field.kind != FormField::Kind::Choice)
         return field.isOn ? localized("On") : localized("Off");
     std::string words;

@@ -52,7 +52,9 @@ TEST_F(PagesEditing, FillsInAFormThatOthersCanReadAfterwards)
     EXPECT_EQ(name.name, "Your name");
     EXPECT_EQ(name.place, (Rect{20, 30, 160, 20}));
     EXPECT_THAT(editing->fields(0)[Town].options, ElementsAre("Rome", "Oslo", "Bern"));
-    EXPECT_THAT(editing->fields(1), IsEmpty());
+    ASSERT_EQ(editing->fields(1).size(), 1U);
+    EXPECT_TRUE(editing->fields(1)[0].isMultiline);
+    EXPECT_EQ(editing->fields(1)[0].page, 1U);
 
     EXPECT_FALSE(editing->apply(FieldTextEdit{0, field(Name), "Zoë Žižka علي"}));
     EXPECT_FALSE(editing->apply(FieldStateEdit{0, field(Agree), true}));

@@ -1,6 +1,7 @@
 #include "PreviewFixture.h"
 #include "platform/FileSystem.h"
 #include "platform/PagedDocumentEditing.h"
+#include "platform/components/NoteView.h"
 #include "platform/components/PreviewContent.h"
 #include "platform/components/PreviewEditor.h"
 #include "platform/components/PreviewFieldBar.h"
@@ -82,6 +83,12 @@ protected:
         asked->press(*action);
         drive.dispatch->runUntilIdle();
     }
+    void writeNote(const std::string& text) const
+    {
+        const auto screen = std::dynamic_pointer_cast<NoteScreen>(alert()->contentViewController());
+        ASSERT_TRUE(screen);
+        screen->note()->userEdited(text);
+    }
     static std::string contentOf(const Url& url)
     {
         std::ifstream file(url.path(), std::ios::binary);
@@ -131,7 +138,7 @@ TEST_F(PreviewEditingTest, SavesWhenThePersonIsDoneAndGoesOnShowingThePlace)
     pages().userSees({0, 300, 224, 300});
     edit();
     EXPECT_TRUE(preview->screenView()->toolbar()->isHidden());
-    EXPECT_THAT(pages().fields(), SizeIs(5));
+    EXPECT_THAT(pages().fields(), SizeIs(6));
     write("Ada");
     EXPECT_EQ(preview->editor()->fieldBar()->nameLabel()->text(), "Your name");
     const auto box = pages().fields()[1];
@@ -179,16 +186,16 @@ TEST_F(PreviewEditingTest, TakesBackMarksAndNotesAndReadsThem)
     EXPECT_THAT(preview->screenView()->note(), HasSubstr("Tap"));
     tap(at(100, 150));
     ASSERT_TRUE(alert());
-    EXPECT_TRUE(alert()->textFields().front()->userEdited("mine", {}));
+    writeNote("mine");
     answer("Done");
     tap(at(100, 150));
     EXPECT_EQ(alert()->message(), "mine");
     answer("Change Text");
-    EXPECT_TRUE(alert()->textFields().front()->userEdited("ours", {}));
+    writeNote("ours\nand theirs");
     answer("Done");
     const auto marks = [&] { return preview->editor()->editing()->pages()->marks(0); };
     ASSERT_THAT(marks(), SizeIs(3));
-    EXPECT_EQ(marks()[2].text, "ours");
+    EXPECT_EQ(marks()[2].text, "ours\nand theirs");
     tap(at(60, 255));
     answer("Remove");
     EXPECT_THAT(marks(), SizeIs(2));

@@ -9,6 +9,7 @@ namespace testing_support {
 /// A PDF document of two pages of 200 by 300 points with an index. The first one has the text "Hello
 /// wonderful" and a form: a name (called "Your name"), a box, a choice of three towns, two buttons of which
 /// the first is pressed, a field that must not be changed, one that nobody sees, and a note by somebody else.
+/// The second one has a field for several lines.
 inline std::string formPdf(const std::string& trailer = {})
 {
     const std::string widget = "<</Type/Annot/Subtype/Widget/P 4 0 R";
@@ -29,7 +30,7 @@ inline std::string formPdf(const std::string& trailer = {})
             "<</Type/Page/Parent 2 0 R/MediaBox[0 0 200 300]/Contents 6 0 R/Annots[10 0 R 11 0 R 12 0 R 13 0 "
             "R "
             "14 0 R 16 0 R 17 0 R 18 0 R]/Resources<</Font<</F 3 0 R>>>>>>"},
-        {5, "<</Type/Page/Parent 2 0 R/MediaBox[0 0 200 300]/Resources<<>>>>"},
+        {5, "<</Type/Page/Parent 2 0 R/MediaBox[0 0 200 300]/Annots[19 0 R]/Resources<<>>>>"},
         {6, stream("", drawing)},
         {10, widget + "/FT/Tx/T(name)/TU(Your name)/Rect[20 250 180 270]/F 4" + text + ">>"},
         {11,
@@ -45,6 +46,9 @@ inline std::string formPdf(const std::string& trailer = {})
         {16, widget + "/FT/Tx/Ff 1/T(total)/Rect[20 130 180 150]/F 4" + text + ">>"},
         {17, widget + "/FT/Tx/T(secret)/Rect[20 100 180 120]/F 2" + text + ">>"},
         {18, "<</Type/Annot/Subtype/Text/Rect[160 20 180 40]/F 28/T(Ada)/Contents(Seen by Ada)>>"},
+        {19,
+            "<</Type/Annot/Subtype/Widget/P 5 0 R/FT/Tx/Ff 4096/T(remarks)/Rect[20 200 180 270]/F 4" + text
+                + ">>"},
         {20, stream("/Type/XObject/Subtype/Form/BBox[0 0 20 20]", tick)},
         {21, stream("/Type/XObject/Subtype/Form/BBox[0 0 20 20]", " ")},
     };

@@ -1,0 +1,53 @@
+#pragma once
+
+#include "platform/ui/HostedView.h"
+#include "platform/ui/ViewController.h"
+
+#include <memory>
+#include <string>
+#include <utility>
+
+namespace platform::components {
+
+/// A text of several lines that a person writes. Main thread only.
+class NoteView : public ui::HostedView {
+public:
+    static constexpr const char* kindName = "note";
+    static constexpr double height = 132; ///< points
+
+    explicit NoteView(std::string text)
+        : HostedView(kindName)
+        , _text(std::move(text))
+    {
+    }
+
+    const std::string& text() const { return _text; }
+    /// Event up: the native view shows this text now.
+    void userEdited(std::string text) { _text = std::move(text); }
+
+private:
+    std::string _text;
+};
+
+/// A note as the content of an alert.
+class NoteScreen : public ui::ViewController {
+public:
+    /// `name` is what the text is called, for those who do not see it.
+    NoteScreen(const std::string& name, std::string text)
+        : _note(std::make_shared<NoteView>(std::move(text)))
+    {
+        _note->setAccessibilityLabel(name);
+    }
+
+    const std::shared_ptr<NoteView>& note() const { return _note; }
+    void loadView() override
+    {
+        setView(_note);
+        _note->anchor(ui::LayoutAttribute::Height).equalToConstant(NoteView::height)->setActive(true);
+    }
+
+private:
+    std::shared_ptr<NoteView> _note;
+};
+
+} // namespace platform::components
