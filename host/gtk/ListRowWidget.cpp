@@ -248,6 +248,10 @@ void showAccessible(TrwListRow* row, const ui::ListRow& content)
     if (name.empty())
         name = content.detail.empty() ? content.title : content.title + ", " + content.detail;
     gtk_accessible_update_property(GTK_ACCESSIBLE(row), GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
+    // The place of the list that has the keyboard says it as well.
+    if (auto* place = gtk_widget_get_parent(GTK_WIDGET(row)))
+        gtk_accessible_update_property(
+            GTK_ACCESSIBLE(place), GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
     if (content.check == ui::CheckState::None)
         gtk_accessible_reset_state(GTK_ACCESSIBLE(row), GTK_ACCESSIBLE_STATE_PRESSED);
     else

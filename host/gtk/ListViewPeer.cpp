@@ -118,6 +118,8 @@ void ListViewPeer::buildWidgets()
     gtk_list_view_set_single_click_activate(GTK_LIST_VIEW(_listWidget), TRUE);
     gtk_widget_add_css_class(_listWidget, "kit-list");
     _window = gtk_scrolled_window_new();
+    // The keyboard goes to what scrolls here, not to its frame.
+    gtk_widget_set_focusable(_window, FALSE);
     gtk_scrolled_window_set_policy(GTK_SCROLLED_WINDOW(_window), GTK_POLICY_NEVER, GTK_POLICY_AUTOMATIC);
     gtk_scrolled_window_set_child(GTK_SCROLLED_WINDOW(_window), _listWidget);
     _spinner = gtk_spinner_new();

@@ -34,6 +34,7 @@ public:
     std::vector<GtkWidget*> liveRows() const;
 
 protected:
+    GtkWidget* spoken() const override { return _listWidget; }
     GtkWidget* childContainer() const override { return widget(); }
     platform::Point childOrigin() const override { return {}; }
     void mirror(platform::ui::View& view, platform::ui::ViewChanges changes) override;

@@ -43,6 +43,8 @@ ScrollViewPeer::ScrollViewPeer(
 {
     CanvasWidget::setClient(_content.get(), _contentClient.get());
     auto* window = gtk_scrolled_window_new();
+    // The keyboard goes to what scrolls here, not to its frame.
+    gtk_widget_set_focusable(window, FALSE);
     gtk_scrolled_window_set_child(GTK_SCROLLED_WINDOW(window), _content.get());
     setNative(window);
     auto* horizontal = gtk_scrolled_window_get_hadjustment(GTK_SCROLLED_WINDOW(window));

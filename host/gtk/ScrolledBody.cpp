@@ -40,6 +40,8 @@ void allocate(GtkWidget* bin, int width, int height, int baseline)
 GtkWidget* makeScrolledBody(GtkWidget* body)
 {
     auto* window = gtk_scrolled_window_new();
+    // The keyboard goes to what scrolls here, not to its frame.
+    gtk_widget_set_focusable(window, FALSE);
     gtk_scrolled_window_set_policy(GTK_SCROLLED_WINDOW(window), GTK_POLICY_NEVER, GTK_POLICY_AUTOMATIC);
     gtk_scrolled_window_set_child(GTK_SCROLLED_WINDOW(window), body);
     auto* bin = adw_bin_new();

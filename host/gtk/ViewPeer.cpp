@@ -165,7 +165,7 @@ void ViewPeer::mirrorSubviews(const View& shown)
 void ViewPeer::mirrorAccessibility(const View& shown)
 {
     const auto& accessibility = shown.accessibility();
-    auto* accessible = GTK_ACCESSIBLE(_native ? _native.get() : _canvas.get());
+    auto* accessible = GTK_ACCESSIBLE(spoken());
     if (!accessibility.label.empty())
         gtk_accessible_update_property(
             accessible, GTK_ACCESSIBLE_PROPERTY_LABEL, accessibility.label.c_str(), -1);

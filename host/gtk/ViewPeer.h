@@ -58,6 +58,8 @@ protected:
     PeerContext& context() const { return *_context; }
     const std::shared_ptr<PeerContext>& sharedContext() const { return _context; }
     void setNative(GtkWidget* native);
+    /// What tells assistive technology of the view.
+    virtual GtkWidget* spoken() const { return _native ? _native.get() : _canvas.get(); }
     /// Where the subviews' widgets go, and how far their frames are moved there.
     virtual GtkWidget* childContainer() const { return _canvas.get(); }
     virtual platform::Point childOrigin() const;

@@ -38,6 +38,8 @@ ZoomScroller::ZoomScroller(ZoomContent& content, GtkAccessibleRole role, Drag dr
     gtk_widget_set_direction(_canvas, GTK_TEXT_DIR_LTR);
     ZoomCanvas::setClient(_canvas, this);
     gtk_scrolled_window_set_child(GTK_SCROLLED_WINDOW(widget()), _canvas);
+    // The keyboard goes to what scrolls here, not to its frame.
+    gtk_widget_set_focusable(widget(), FALSE);
     addPinch();
     addWheel();
     addDoubleTap();

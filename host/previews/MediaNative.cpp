@@ -1,6 +1,7 @@
 #include "host/previews/MediaNative.h"
 
 #include "host/previews/MediaSupport.h"
+#include "platform/Localization.h"
 
 #include <utility>
 
@@ -13,6 +14,25 @@ using platform::components::PreviewMediaView;
 namespace {
 
 constexpr int iconSide = 128, spacing = 18; ///< points
+
+void name(GtkWidget* control, const std::string& text)
+{
+    gtk_accessible_update_property(GTK_ACCESSIBLE(control), GTK_ACCESSIBLE_PROPERTY_LABEL, text.c_str(), -1);
+}
+
+/// The toolkit gives its player's controls icons, but no words.
+void nameControls(GtkWidget* player, const std::string& button)
+{
+    for (auto* child = gtk_widget_get_first_child(player); child;
+         child = gtk_widget_get_next_sibling(child)) {
+        const bool isVolume = GTK_IS_VOLUME_BUTTON(child);
+        if (GTK_IS_BUTTON(child))
+            name(child, button);
+        else if (GTK_IS_SCALE(child))
+            name(child, platform::localized("Position"));
+        nameControls(child, isVolume ? platform::localized("Volume") : button);
+    }
+}
 
 } // namespace
 
@@ -67,6 +87,7 @@ void MediaNative::showFilm()
     gtk_widget_set_vexpand(_player, TRUE);
     gtk_widget_set_hexpand(_player, TRUE);
     gtk_box_append(GTK_BOX(widget()), _player);
+    nameControls(_player, platform::localized("Play or Pause"));
 }
 
 void MediaNative::showSound(const PreviewMediaView::Content& media)
@@ -86,6 +107,7 @@ void MediaNative::showSound(const PreviewMediaView::Content& media)
     gtk_widget_set_size_request(controls, 300, -1);
     for (auto* part : {icon, title, controls})
         gtk_box_append(GTK_BOX(_player), part);
+    nameControls(_player, platform::localized("Play or Pause"));
     gtk_box_append(GTK_BOX(widget()), _player);
 }
 

@@ -92,6 +92,8 @@ void TextNative::build()
         GTK_STYLE_PROVIDER_PRIORITY_APPLICATION);
     gtk_scrolled_window_set_policy(GTK_SCROLLED_WINDOW(widget()), GTK_POLICY_NEVER, GTK_POLICY_AUTOMATIC);
     gtk_scrolled_window_set_child(GTK_SCROLLED_WINDOW(widget()), _text);
+    // The keyboard goes to what scrolls here, not to its frame.
+    gtk_widget_set_focusable(_window.get(), FALSE);
 }
 
 void TextNative::start()

@@ -83,6 +83,7 @@ void DocumentListController::loadView()
 {
     const auto view = std::make_shared<ui::View>();
     _listView = std::make_shared<ui::ListView>();
+    _listView->setAccessibility({.label = title(), .hint = {}});
     _listView->setRefreshable(true);
     _placeholder = PlaceholderView::create();
     _placeholder->setHidden(true);

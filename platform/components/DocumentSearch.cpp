@@ -38,6 +38,7 @@ DocumentSearch::DocumentSearch(Handlers handlers)
 void DocumentSearch::build()
 {
     _results = std::make_shared<ui::ListView>();
+    _results->setAccessibility({.label = localized("Search"), .hint = {}});
     _results->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
     _source = DocumentRowSource::create(_results);
     _source->setPlaces(placeText);

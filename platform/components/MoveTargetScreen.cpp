@@ -52,6 +52,7 @@ void MoveTargetScreen::loadView()
 {
     const auto view = std::make_shared<ui::View>();
     _listView = std::make_shared<ui::ListView>();
+    _listView->setAccessibility({.label = title(), .hint = {}});
     _placeholder = PlaceholderView::create();
     _placeholder->setHidden(true);
     fill(*view, _listView);

@@ -29,6 +29,14 @@ std::string Accessible::name() const
     return answer;
 }
 
+std::string Accessible::roleName() const
+{
+    char* text = atspi_accessible_get_role_name(_node.get(), nullptr);
+    std::string answer = text ? text : "";
+    g_free(text);
+    return answer;
+}
+
 bool Accessible::hasState(AtspiStateType state) const
 {
     auto* states = atspi_accessible_get_state_set(_node.get());

@@ -39,6 +39,9 @@ public:
     bool hasRole(AtspiRole role) const;
     /// Whether the keyboard is here.
     bool isFocused() const { return hasState(ATSPI_STATE_FOCUSED); }
+    /// Whether the keyboard can go here.
+    bool isFocusable() const { return hasState(ATSPI_STATE_FOCUSABLE); }
+    std::string roleName() const;
     bool isSensitive() const { return hasState(ATSPI_STATE_SENSITIVE); }
     /// The content of a text.
     std::string text() const;

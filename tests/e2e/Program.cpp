@@ -177,8 +177,9 @@ void Program::pressUntil(const std::string& beginning, const std::function<bool(
     EXPECT_TRUE(Accessible::waitFor([&] {
         if (effect())
             return true;
-        if (looks++ % looksBetweenPresses == 0 && shows(beginning))
-            press(beginning);
+        const auto found = buttons(beginning);
+        if (looks++ % looksBetweenPresses == 0 && !found.empty())
+            found.back().press();
         return false;
     })) << beginning;
 }
