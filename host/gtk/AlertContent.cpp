@@ -15,6 +15,7 @@ namespace {
 
 constexpr double fieldHeight = 44; ///< points
 constexpr double assumedWidth = 280; ///< of the content, before the alert has a width
+constexpr std::size_t standingButtons = 3; ///< a low window has room for so many below the text
 constexpr std::size_t longestTitleBesideAnother = 14; ///< characters
 
 GtkWidget* makeLabel(const char* styleClass)
@@ -76,6 +77,7 @@ AlertContent::AlertContent(std::shared_ptr<PeerContext> context, std::shared_ptr
     , _alert(alert)
     , _card(ObjectRef<GtkWidget>::retain(GTK_WIDGET(g_object_new(GTK_TYPE_BOX, "accessible-role",
           GTK_ACCESSIBLE_ROLE_ALERT_DIALOG, "orientation", GTK_ORIENTATION_VERTICAL, nullptr))))
+    , _lines(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0))
     , _body(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0))
     , _title(makeLabel("alert-title"))
     , _message(makeLabel("alert-message"))
@@ -99,13 +101,14 @@ AlertContent::~AlertContent()
     }
 }
 
-/// What does not fit a low window is scrolled, the buttons stay.
+/// What does not fit a low window is scrolled, a few buttons stay.
 void AlertContent::buildBody()
 {
     gtk_widget_add_css_class(_body, "alert-body");
     gtk_box_append(GTK_BOX(_body), _title);
     gtk_box_append(GTK_BOX(_body), _message);
-    gtk_box_append(GTK_BOX(widget()), makeScrolledBody(_body));
+    gtk_box_append(GTK_BOX(_lines), _body);
+    gtk_box_append(GTK_BOX(widget()), makeScrolledBody(_lines));
 }
 
 void AlertContent::addFields(const Alert& alert)
@@ -169,7 +172,7 @@ void AlertContent::rebuildButtons(const Alert& alert)
     _connections.clear();
     _buttons.clear();
     if (_buttonBox)
-        gtk_box_remove(GTK_BOX(widget()), _shownButtons);
+        gtk_box_remove(GTK_BOX(gtk_widget_get_parent(_buttonBox)), _buttonBox);
     const auto orientation = buttonOrientation(alert);
     _buttonBox = gtk_box_new(orientation, 0);
     gtk_box_set_homogeneous(GTK_BOX(_buttonBox), orientation == GTK_ORIENTATION_HORIZONTAL);
@@ -179,10 +182,8 @@ void AlertContent::rebuildButtons(const Alert& alert)
         _buttons.push_back(makeActionButton(action, alert));
         gtk_box_append(GTK_BOX(_buttonBox), _buttons.back());
     }
-    // More than anybody needs for a question are a list to choose from.
-    constexpr std::size_t mostButtons = 8;
-    _shownButtons = _buttons.size() > mostButtons ? makeScrolledBody(_buttonBox) : _buttonBox;
-    gtk_box_append(GTK_BOX(widget()), _shownButtons);
+    const bool areFew = _buttons.size() <= standingButtons;
+    gtk_box_append(GTK_BOX(areFew ? widget() : _lines), _buttonBox);
 }
 
 void AlertContent::mirror()

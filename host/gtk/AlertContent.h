@@ -36,8 +36,7 @@ private:
     std::shared_ptr<PeerContext> _context;
     std::weak_ptr<Alert> _alert;
     ObjectRef<GtkWidget> _card;
-    GtkWidget *_body, *_title, *_message, *_buttonBox = nullptr;
-    GtkWidget* _shownButtons = nullptr; ///< the box, or what scrolls it
+    GtkWidget *_lines, *_body, *_title, *_message, *_buttonBox = nullptr;
     std::vector<GtkWidget*> _buttons; ///< in the order of the actions
     std::vector<std::shared_ptr<ViewPeer>> _peers;
     std::shared_ptr<Observer> _observer;

@@ -61,6 +61,7 @@ OverlayLayer::~OverlayLayer()
 void OverlayLayer::place(LayerPlace layerPlace)
 {
     gtk_widget_add_css_class(_card, "layer-card");
+    gtk_widget_set_overflow(_card, GTK_OVERFLOW_HIDDEN);
     gtk_widget_add_css_class(_backdrop, "layer-backdrop");
     GtkWidget* placed = _card;
     switch (layerPlace) {
@@ -76,7 +77,6 @@ void OverlayLayer::place(LayerPlace layerPlace)
         break;
     case LayerPlace::Sheet:
         gtk_widget_set_vexpand(_card, TRUE);
-        gtk_widget_set_overflow(_card, GTK_OVERFLOW_HIDDEN);
         setMargins(_card, edgeDistance * 2);
         placed = makeClamp(_card, sheetWidth);
         break;
