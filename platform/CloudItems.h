@@ -40,7 +40,16 @@ public:
 
     /// Brings the content of a promised document here, in the background, and puts the document in the
     /// promise's place. One that is here already is no error, and its handlers are called, too. Any thread.
+    /// Who asks for the same document meanwhile waits for the same download.
     virtual std::unique_ptr<ItemDownload> startDownload(const Url& url, DownloadHandlers handlers) = 0;
+    /// The same without a handle: it goes on until it ends or is cancelled by `cancelDownload`, and the
+    /// completion is called once, on the main queue.
+    virtual void download(const Url& url, std::function<void(const std::optional<Error>&)> completion) = 0;
+    /// How much of a document has arrived that anybody downloads; nothing while nobody does.
+    /// Notification::DownloadsDidChange says when to ask again. Any thread.
+    virtual std::optional<DownloadProgress> downloadProgress(const Url& url) const = 0;
+    /// Ends a document's download for all who wait for it: they hear FileErrorCode::Cancelled. Any thread.
+    virtual void cancelDownload(const Url& url) = 0;
 
     /// Finds the document that a bookmark string from another device names. The completion is called once, on
     /// any thread, with the URL or the error (damaged, too large, unknown account or document).

@@ -15,6 +15,7 @@ enum class Notification {
     ApplicationWillTerminate, ///< nothing that is put in a queue now will run
     CloudIdentityDidChange,
     StorageOfferDidChange,
+    DownloadsDidChange, ///< one began, got on or ended; user information: "url", the document's
     ActivityOffersDidChange, ///< what other devices hand over; see ActivityHandOver
     KeyValueStoreDidChangeExternally,
     KeyboardWillShow, ///< user information: "height" in points

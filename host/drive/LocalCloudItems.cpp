@@ -69,14 +69,17 @@ Result<Url> findBookmarked(
 
 LocalCloudItems::LocalCloudItems(DriveLayout layout, std::shared_ptr<IndexedItemChanges> changes,
     std::shared_ptr<LocalDocumentIdentifiers> identifiers, std::shared_ptr<CloudStore> store,
-    const std::shared_ptr<platform::Dispatch>& dispatch)
+    const std::shared_ptr<platform::Dispatch>& dispatch,
+    std::shared_ptr<platform::NotificationCenter> notifications)
     : _layout(std::move(layout))
     , _changes(std::move(changes))
     , _identifiers(std::move(identifiers))
-    , _downloads{_layout, std::move(store),
-          dispatch->makeOperationQueue(
-              "TarrowDriveAppID.downloads", platform::QualityOfService::UserInitiated),
-          dispatch->mainQueue()}
+    , _downloads(
+          std::make_shared<RunningDownloads>(LocalDownload::Setting{_layout, std::move(store),
+                                                 dispatch->makeOperationQueue("TarrowDriveAppID.downloads",
+                                                     platform::QualityOfService::UserInitiated),
+                                                 dispatch->mainQueue()},
+              std::move(notifications)))
     , _queue(dispatch->makeSerialQueue("TarrowDriveAppID.bookmarks"))
 {
 }
@@ -102,17 +105,38 @@ std::optional<Error> LocalCloudItems::evictItem(const Url& url)
     return _changes->evictItem(url.path());
 }
 
-std::unique_ptr<platform::ItemDownload> LocalCloudItems::startDownload(
-    const Url& url, platform::DownloadHandlers handlers)
+/// What came has another inode than what was promised.
+LocalCloudItems::Completion LocalCloudItems::identifying(const Url& url, Completion completion) const
 {
-    handlers.completion = [identifiers = _identifiers, path = url.path(),
-                              completion = std::move(handlers.completion)](const auto& error) {
+    return [identifiers = _identifiers, path = url.path(), completion = std::move(completion)](
+               const auto& error) {
         if (!error)
             identifiers->replaced(path);
         if (completion)
             completion(error);
     };
-    return LocalDownload::start(_downloads, url.path(), std::move(handlers));
+}
+
+std::unique_ptr<platform::ItemDownload> LocalCloudItems::startDownload(
+    const Url& url, platform::DownloadHandlers handlers)
+{
+    handlers.completion = identifying(url, std::move(handlers.completion));
+    return _downloads->start(url.path(), std::move(handlers));
+}
+
+void LocalCloudItems::download(const Url& url, Completion completion)
+{
+    _downloads->startUnkept(url.path(), identifying(url, std::move(completion)));
+}
+
+std::optional<platform::DownloadProgress> LocalCloudItems::downloadProgress(const Url& url) const
+{
+    return _downloads->progress(url.path());
+}
+
+void LocalCloudItems::cancelDownload(const Url& url)
+{
+    _downloads->cancel(url.path());
 }
 
 void LocalCloudItems::RZBookmarkableStringFromDocumentURL(

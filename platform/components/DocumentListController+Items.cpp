@@ -1,9 +1,13 @@
 #include "platform/components/DocumentListController.h"
 
+#include "platform/CloudDocumentService.h"
 #include "platform/Localization.h"
+#include "platform/Services.h"
 #include "platform/components/DocumentPeek.h"
 #include "platform/components/DocumentRowSource.h"
+#include "platform/components/ErrorWords.h"
 #include "platform/components/FolderContents.h"
+#include "platform/ui/AlertAction.h"
 #include "platform/ui/AlertController.h"
 #include "platform/ui/ListView.h"
 
@@ -141,6 +145,8 @@ ui::Menu DocumentListController::menuForRow(ui::ListView&, std::size_t index)
     if (_editing || !rows || index >= rows->count())
         return menu;
     const auto kind = rows->entry(index).kind;
+    if (rows->entry(index).isPromise)
+        menu.push_back(downloadEntry(rows->url(index)));
     for (const auto& entry : menuEntries) {
         if (!offers(entry.action, kind))
             continue;
@@ -154,6 +160,36 @@ ui::Menu DocumentListController::menuForRow(ui::ListView&, std::size_t index)
             .image = {}});
     }
     return menu;
+}
+
+ui::MenuAction DocumentListController::downloadEntry(const Url& url)
+{
+    const bool isRunning = services().cloudDocumentService().items().downloadProgress(url).has_value();
+    auto chosen = [weak = std::weak_ptr(self()), url, isRunning] {
+        if (isRunning)
+            services().cloudDocumentService().items().cancelDownload(url);
+        else if (const auto list = weak.lock())
+            list->download(url);
+    };
+    return {.title = isRunning ? localized("Cancel Download") : localized("Download"),
+        .handler = std::move(chosen),
+        .image = {}};
+}
+
+/// Goes on when the list is left: only a failure is told in the list.
+void DocumentListController::download(const Url& url)
+{
+    services().cloudDocumentService().items().download(
+        url, [weak = std::weak_ptr(self())](const std::optional<Error>& error) {
+            const auto list = weak.lock();
+            if (!list || !error || error->is(FileErrorCode::Cancelled))
+                return;
+            const auto alert = std::make_shared<ui::AlertController>(
+                localized("It could not be downloaded."), errorWords(*error), ui::AlertStyle::Alert);
+            alert->addAction(
+                std::make_shared<ui::AlertAction>(localized("OK"), ui::AlertActionStyle::Default));
+            list->presentViewController(alert, true);
+        });
 }
 
 void DocumentListController::perform(DocumentListAction action, const Url& url)

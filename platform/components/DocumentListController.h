@@ -138,6 +138,8 @@ private:
     void reportRemovalIfShown();
     void open(const Url& url, FolderEntryKind kind);
     void perform(DocumentListAction action, const Url& url);
+    ui::MenuAction downloadEntry(const Url& url);
+    void download(const Url& url);
     /// The place of an item's row, for what points there; the list's when the row is not seen.
     std::shared_ptr<ui::View> anchorFor(const Url& url);
     void openFromPeek(const Url& url, FolderEntryKind kind);

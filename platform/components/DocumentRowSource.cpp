@@ -1,5 +1,6 @@
 #include "platform/components/DocumentRowSource.h"
 
+#include "platform/CloudDocumentService.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"
@@ -62,6 +63,7 @@ std::shared_ptr<DocumentRowSource> DocumentRowSource::create(const std::shared_p
             if (const auto self = weak.lock())
                 self->thumbnailArrived(id, std::move(thumbnail));
         });
+    source->followDownloads();
     return source;
 }
 
@@ -99,6 +101,8 @@ ui::ListRow DocumentRowSource::rowAtIndex(const ui::ListView&, std::size_t index
     const bool isKnown = known != _known.end();
     if (isKnown)
         complete(row, known->second.details);
+    if (row.download == ui::DownloadState::InCloud)
+        showDownload(row, index);
     if (isKnown && known->second.thumbnail)
         row.image = known->second.thumbnail;
     if (_places)
@@ -117,6 +121,27 @@ void DocumentRowSource::complete(ui::ListRow& row, const RowDetails& details) co
         row.download = details.download;
     if (_tagColors && !details.tagNames.empty())
         row.tagColors = _tagColors(details.tagNames);
+}
+
+void DocumentRowSource::followDownloads()
+{
+    _onDownloads = services().notificationCenter().observe(
+        Notification::DownloadsDidChange, [weak = weak_from_this()](const PropertyDictionary& userInfo) {
+            const auto self = weak.lock();
+            const auto url = userInfo.find("url");
+            if (self && self->_rows && url != userInfo.end())
+                self->tellIfVisible(self->_rows->idFor(*url->second.get<Url>()));
+        });
+}
+
+void DocumentRowSource::showDownload(ui::ListRow& row, std::size_t index) const
+{
+    const auto progress = services().cloudDocumentService().items().downloadProgress(_rows->url(index));
+    if (!progress)
+        return;
+    row.download = ui::DownloadState::Downloading;
+    if (progress->total && *progress->total > 0)
+        row.downloadProgress = static_cast<double>(progress->done) / static_cast<double>(*progress->total);
 }
 
 Image DocumentRowSource::iconFor(std::size_t index, const FolderEntry& entry) const

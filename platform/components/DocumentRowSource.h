@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/Color.h"
+#include "platform/NotificationCenter.h"
 #include "platform/components/DocumentRows.h"
 #include "platform/components/RowDetails.h"
 #include "platform/components/VisibleRowLoader.h"
@@ -70,6 +71,8 @@ private:
         const std::function<bool(const Known* known)>& lackSomething) const;
     void fetchThumbnails();
     void tellIfVisible(ui::RowId id) const;
+    void followDownloads();
+    void showDownload(ui::ListRow& row, std::size_t index) const;
     void forgetDetailsOutside(const ui::RowRange& range);
     void complete(ui::ListRow& row, const RowDetails& details) const;
     Image iconFor(std::size_t index, const FolderEntry& entry) const;
@@ -81,6 +84,7 @@ private:
     std::shared_ptr<const DocumentRows> _rows;
     std::shared_ptr<Loader> _loader;
     std::shared_ptr<ThumbnailLoader> _thumbnails;
+    Observation _onDownloads;
     TagColors _tagColors;
     Places _places;
     std::unordered_map<ui::RowId, Known> _known;

@@ -115,6 +115,13 @@ void PreviewController::downloadEnded(const std::optional<Error>& error)
         load(previewLimitsForMainScreen());
         return;
     }
+    // Somewhere else: the list offers that, too.
+    if (error->is(FileErrorCode::Cancelled)) {
+        _isDownloadWanted = false;
+        if (_screen)
+            showSummary();
+        return;
+    }
     auto failure = *_content;
     failure.kind = PreviewContent::Kind::Failure;
     failure.note = localized("It could not be downloaded.") + '\n' + errorWords(*error);

@@ -17,6 +17,7 @@
 
 #include <cerrno>
 #include <filesystem>
+#include <fstream>
 
 using namespace platform;
 using namespace platform::components;
@@ -225,6 +226,51 @@ TEST_F(DocumentList, OffersTheEnabledActionsWithTheirCodes)
     for (const auto& entry : list->listView()->menuForRow(0))
         titlesOfLibrary.push_back(entry.title);
     EXPECT_EQ(titlesOfLibrary, (Lines{"Info", "Share", "Delete"}));
+}
+
+TEST_F(DocumentList, DownloadsADocumentAndShowsHowFarItIs)
+{
+    host::drive::PromiseRecord far;
+    far.size = 4'000'000;
+    far.content = "far";
+    std::filesystem::create_directories(drive.layout().cloud());
+    std::ofstream(drive.layout().cloud() + "/far") << std::string(4'000'000, 'x');
+    drive.writePromise("Stuff/far.txt", far);
+    const auto list = shownList(drive.url("Stuff"));
+    deliver(list, {{"far.txt", Kind::Document, true}, {"here.txt"}});
+    const auto row = [&] { return list->listView()->row(0); };
+    const auto choose = [&](const std::string& title) {
+        ASSERT_EQ(list->listView()->menuForRow(0).front().title, title);
+        list->listView()->menuForRow(0).front().handler();
+    };
+    EXPECT_TRUE(list->listView()->menuForRow(1).empty());
+    choose("Download");
+    EXPECT_EQ(row().download, ui::DownloadState::Downloading);
+    EXPECT_THAT(row().accessibleDescription, HasSubstr("Downloading"));
+    choose("Cancel Download");
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(row().download, ui::DownloadState::InCloud);
+
+    struct Shares : RecordingListObserver {
+        void rowDidChange(ui::ListView& view, std::size_t index) override
+        {
+            shares.push_back(view.row(index).downloadProgress);
+        }
+        std::vector<double> shares;
+    };
+    const auto observer = std::make_shared<Shares>();
+    list->listView()->setListObserver(observer);
+    choose("Download");
+    drive.dispatch->runUntilIdle();
+    EXPECT_THAT(observer->shares, testing::Contains(testing::AllOf(testing::Gt(0.2), testing::Lt(0.9))));
+    EXPECT_TRUE(std::filesystem::exists(drive.url("Stuff/far.txt").path()));
+
+    std::filesystem::remove(drive.url("Stuff/far.txt").path());
+    far.content = "lost";
+    drive.writePromise("Stuff/far.txt", far);
+    choose("Download");
+    drive.dispatch->runUntilIdle();
+    EXPECT_TRUE(std::dynamic_pointer_cast<ui::AlertController>(list->presentedViewController()));
 }
 
 TEST_F(DocumentList, AnswersTheKeysOfItsRows)

@@ -120,6 +120,45 @@ TEST_F(DownloadTest, PutsTheDocumentWithAllThatIsKnownOfItInThePromisesPlace)
     EXPECT_EQ(read(item.path()), text);
 }
 
+TEST_F(DownloadTest, IsOneForAllWhoAskForTheDocument)
+{
+    const std::string text(5'000'000, 'x');
+    const auto item = promise("a.txt", text);
+    auto& items = cloud->items();
+    auto first = start(item);
+    items.download(item, [this](const auto& error) { ended.push_back(error); });
+    EXPECT_EQ(items.downloadProgress(item), DownloadProgress());
+    std::vector<std::optional<DownloadProgress>> told;
+    const auto observation =
+        notifications->observe(platform::Notification::DownloadsDidChange, [&](const auto& userInfo) {
+            EXPECT_EQ(*userInfo.at("url").template get<Url>(), item);
+            told.push_back(items.downloadProgress(item));
+        });
+    onProgress = [&] { first.reset(); }; // the other one still waits
+    dispatch->runUntilIdle();
+    EXPECT_EQ(heard.size(), 1U);
+    EXPECT_EQ(ended, (std::vector<std::optional<Error>>(1)));
+    EXPECT_EQ(read(item.path()), text);
+    ASSERT_GE(told.size(), 3U);
+    EXPECT_EQ(told.back(), std::nullopt);
+    EXPECT_EQ(told[told.size() - 2], (DownloadProgress{text.size(), text.size()}));
+}
+
+TEST_F(DownloadTest, EndsForAllWhenItIsCancelledForTheDocument)
+{
+    const std::string text(5'000'000, 'x');
+    const auto item = promise("a.txt", text);
+    const auto first = start(item);
+    cloud->items().download(item, [this](const auto& error) { ended.push_back(error); });
+    cloud->items().cancelDownload(item);
+    dispatch->runUntilIdle();
+    ASSERT_EQ(ended.size(), 2U);
+    for (const auto& error : ended)
+        EXPECT_TRUE(error && error->is(FileErrorCode::Cancelled));
+    EXPECT_EQ(cloud->items().downloadProgress(item), std::nullopt);
+    EXPECT_TRUE(isIntact("a.txt", text));
+}
+
 TEST_F(DownloadTest, NothingIsHeardOfACancelledDownloadAndThePromiseStays)
 {
     const std::string text(3'000'000, 'x');
