@@ -3,31 +3,36 @@
 #include "platform/components/PreviewPagesView.h"
 
 #include <algorithm>
+#include <iterator>
 #include <utility>
 
 namespace platform::components {
 
 namespace {
 
-constexpr double fingerReach = 6; ///< page points around what a finger may mean
+constexpr double fingerReach = 20; ///< content points around what a finger may mean
 
-bool holds(const Rect& place, Point point, double reach)
+/// How far a point is from a rectangle, the farther of both directions; 0 within it.
+double distance(const Rect& place, Point point)
 {
-    return point.x >= place.x - reach && point.x <= place.maxX() + reach && point.y >= place.y - reach
-        && point.y <= place.maxY() + reach;
+    const double across = std::max({place.x - point.x, point.x - place.maxX(), 0.0});
+    const double down = std::max({place.y - point.y, point.y - place.maxY(), 0.0});
+    return std::max(across, down);
 }
 
-/// The last one that lies exactly there, else the last one nearby.
-template <typename Things>
-auto found(const Things& things, Point point)
+/// The nearest thing within reach, of several the last; null: none.
+template <typename Thing>
+const Thing* nearest(const std::vector<Thing>& things, Point point, double reach)
 {
-    for (const double reach : {0.0, fingerReach}) {
-        const auto hit = std::find_if(things.rbegin(), things.rend(),
-            [&](const auto& thing) { return holds(thing.place, point, reach); });
-        if (hit != things.rend())
-            return hit;
+    const Thing* found = nullptr;
+    for (const auto& thing : things) {
+        const double away = distance(thing.place, point);
+        if (away > reach)
+            continue;
+        reach = away;
+        found = &thing;
     }
-    return things.rend();
+    return found;
 }
 
 } // namespace
@@ -57,10 +62,11 @@ void PreviewPagesView::findMark(
     if (!_document)
         return;
     post(
-        [place, answer = std::move(answer)](const PagedDocument& document) {
+        [place, reach = fingerReachOn(place.page), answer = std::move(answer)](
+            const PagedDocument& document) {
             const auto marks = document.marks(place.page);
-            const auto hit = found(marks, place.point);
-            const auto mark = hit == marks.rend() ? std::nullopt : std::optional(*hit);
+            const auto* hit = nearest(marks, place.point, reach);
+            const auto mark = hit ? std::optional(*hit) : std::nullopt;
             return [answer, mark](PreviewPagesView&) { answer(mark); };
         },
         _reading);
@@ -108,16 +114,19 @@ const FormField* PreviewPagesView::activeField() const
     return active == _fields.end() ? nullptr : &*active;
 }
 
+double PreviewPagesView::fingerReachOn(std::size_t page) const
+{
+    return fingerReach / _deck.toContent(page, {0, 0, 1, 1}).width;
+}
+
 const FormField* PreviewPagesView::fieldAt(const PagePlace& place) const
 {
-    for (const double reach : {0.0, fingerReach}) {
-        const auto hit = std::ranges::find_if(_fields, [&](const FormField& field) {
-            return field.page == place.page && holds(field.place, place.point, reach);
-        });
-        if (hit != _fields.end())
-            return &*hit;
-    }
-    return nullptr;
+    std::vector<FormField> here;
+    std::ranges::copy_if(
+        _fields, std::back_inserter(here), [&](const FormField& field) { return field.page == place.page; });
+    const auto* hit = nearest(here, place.point, fingerReachOn(place.page));
+    const auto own = hit ? std::ranges::find(_fields, hit->id, &FormField::id) : _fields.end();
+    return own == _fields.end() ? nullptr : &*own;
 }
 
 void PreviewPagesView::setPlacing(bool placing)

@@ -72,8 +72,8 @@ public:
     void userTaps(Point content);
     void userPressesEnter();
     void setOnTap(std::function<void(const PagePlace&)> callback) { _onTap = std::move(callback); }
-    /// The topmost mark at a place, a little beside it for a finger; called later, and not when another
-    /// document is shown by then.
+    /// The mark at a place, the topmost of several, or the nearest that a finger may mean; called later, and
+    /// not when another document is shown by then.
     void findMark(const PagePlace& place, std::function<void(const std::optional<PageMark>&)> found);
     /// The texts that are marked by the person, by page: what is selected, else the match of the search.
     std::map<std::size_t, std::vector<Rect>> chosenPlaces() const;
@@ -118,6 +118,7 @@ private:
     void publishSearch(bool isComplete);
     void readSelection();
     void reveal(const Rect& content);
+    double fingerReachOn(std::size_t page) const; ///< page points
     void post(std::function<std::function<void(PreviewPagesView&)>(const PagedDocument&)> work,
         const std::shared_ptr<Queue>& queue);
     void needsDisplay();

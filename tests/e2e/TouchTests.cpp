@@ -1,7 +1,11 @@
+#include "../support/FormPdf.h"
 #include "DriveTests.h"
 #include "TouchScreen.h"
 
 #include <gmock/gmock.h>
+
+#include <fstream>
+#include <iterator>
 
 namespace e2e {
 namespace {
@@ -93,6 +97,50 @@ TEST_F(TouchTests, AHeldFingerPeeksAndPressesOn)
     screen().lift(0);
     expectShown("Household");
     EXPECT_TRUE(program->dialogs().empty());
+}
+
+TEST_F(TouchTests, FingersFillInAFormAndMarkATextThatIsSavedOnLeaving)
+{
+    const auto form = top / "Form.pdf";
+    std::ofstream(form) << testing_support::formPdf();
+    tap("Form.pdf");
+    tap("Edit document");
+    tap("Next field");
+    const auto isWriting = [this] {
+        const auto entries = program->entries();
+        return !entries.empty() && entries.back().name() == "Your name" && entries.back().isFocused();
+    };
+    ASSERT_TRUE(eventually(isWriting));
+    EXPECT_TRUE(program->entries().back().enter("Ada"));
+    tap("Next field");
+    tap("agree: Off");
+    expectShown("agree: On");
+    tap("Previous field");
+    program->press("Done");
+    tap("Edit document");
+
+    const auto canHighlight = [this] {
+        const auto found = program->buttons("Highlight");
+        return !found.empty() && found.back().isSensitive();
+    };
+    expectShown("Highlight");
+    EXPECT_FALSE(canHighlight());
+    // The line of text, where a page as wide as the window has it. A finger that rests there selects.
+    const double line = 482;
+    screen().put(0, {80, line});
+    ASSERT_TRUE(eventually(canHighlight));
+    screen().move(0, {150, line});
+    screen().move(0, {240, line});
+    screen().lift(0);
+    tap("Highlight");
+    EXPECT_TRUE(eventually([&] { return !canHighlight(); }));
+    tap("Back");
+    const auto holds = [&](const std::string& text) {
+        std::ifstream file(form, std::ios::binary);
+        const std::string bytes{std::istreambuf_iterator<char>(file), {}};
+        return bytes.find(text) != std::string::npos;
+    };
+    EXPECT_TRUE(eventually([&] { return holds("(Ada)") && holds("/Highlight"); }));
 }
 
 TEST_F(TouchTests, AFingerAlongTheMarksSelectsARange)
