@@ -88,6 +88,7 @@ ServiceSet systemServices(const std::string& executable, const UserLocale& local
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(types);
     set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
     set.pagedDocumentOpener = previews;
+    set.textDecoder = previews;
     set.linkOpener = std::make_shared<host::system::GioLinkOpener>();
     set.keyedArchiver = std::make_shared<host::system::JsonKeyedArchiver>();
     return set;

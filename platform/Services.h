@@ -24,6 +24,7 @@ class NotificationCenter;
 class PagedDocumentOpener;
 class PreviewSupport;
 class StorageOfferManager;
+class TextDecoder;
 class TypeRegistry;
 class UserDefaults;
 
@@ -49,6 +50,7 @@ struct ServiceSet {
     std::shared_ptr<PagedDocumentOpener> pagedDocumentOpener;
     std::shared_ptr<PreviewSupport> previewSupport;
     std::shared_ptr<StorageOfferManager> storageOfferManager;
+    std::shared_ptr<TextDecoder> textDecoder;
     std::shared_ptr<TypeRegistry> typeRegistry;
     std::shared_ptr<UserDefaults> userDefaults;
 };
@@ -81,6 +83,7 @@ public:
     PagedDocumentOpener& pagedDocumentOpener() const { return *_set.pagedDocumentOpener; }
     PreviewSupport& previewSupport() const { return *_set.previewSupport; }
     StorageOfferManager& storageOfferManager() const { return *_set.storageOfferManager; }
+    TextDecoder& textDecoder() const { return *_set.textDecoder; }
     TypeRegistry& typeRegistry() const { return *_set.typeRegistry; }
     UserDefaults& userDefaults() const { return *_set.userDefaults; }
 

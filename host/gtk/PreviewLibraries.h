@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/PagedDocument.h"
+#include "platform/TextDecoder.h"
 
 #include <memory>
 #include <string>
@@ -23,6 +24,7 @@ public:
 
     /// Any thread.
     virtual const platform::PagedDocumentOpener& pagedDocuments() const = 0;
+    virtual const platform::TextDecoder& textDecoder() const = 0;
     /// Any thread; may take long. Errors: why the document cannot be printed, in words.
     virtual platform::Result<std::shared_ptr<PrintablePages>> readPrintablePdf(
         const std::string& path) const = 0;

@@ -98,6 +98,12 @@ platform::Result<std::shared_ptr<platform::PagedDocumentEditing>> PreviewModule:
     return missingError();
 }
 
+std::optional<std::string> PreviewModule::decode(std::string_view bytes, platform::TextEnd end) const
+{
+    const auto libraries = load();
+    return libraries ? libraries->textDecoder().decode(bytes, end) : std::nullopt;
+}
+
 std::string PreviewModule::missingWords()
 {
     return system::translated("The part of the program that shows such documents is missing.");

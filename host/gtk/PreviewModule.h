@@ -19,6 +19,7 @@ namespace host::gtk {
 /// Loads the libraries of the previews when they are first wanted, and keeps them. Without them the program
 /// goes on: what needs them says that they are missing.
 class PreviewModule : public platform::PagedDocumentOpener,
+                      public platform::TextDecoder,
                       public std::enable_shared_from_this<PreviewModule> {
 public:
     using Libraries = std::shared_ptr<const PreviewLibraries>;
@@ -40,6 +41,9 @@ public:
     platform::Result<std::shared_ptr<platform::PagedDocument>> open(const std::string& path) const override;
     platform::Result<std::shared_ptr<platform::PagedDocumentEditing>> openForEditing(
         std::shared_ptr<const std::string> bytes) const override;
+
+    /// Loads first. Nothing where the module is missing; else as the decoder of the module.
+    std::optional<std::string> decode(std::string_view bytes, platform::TextEnd end) const override;
 
     /// What is said where the libraries are missing, and the error that says so.
     static std::string missingWords();

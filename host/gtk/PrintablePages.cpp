@@ -3,6 +3,7 @@
 #include "host/gtk/ObjectRef.h"
 #include "host/gtk/PreviewModule.h"
 #include "host/system/Translate.h"
+#include "platform/components/TextDecoding.h"
 
 #include <gdk-pixbuf/gdk-pixbuf.h>
 #include <glib/gstdio.h>
@@ -128,7 +129,7 @@ Result<Pages> readPicture(const std::string& path)
         ObjectRef<GdkPixbuf>::adopt(gdk_pixbuf_apply_embedded_orientation(raw.get()))));
 }
 
-Result<Pages> readText(const std::string& path)
+Result<Pages> readText(const std::string& path, const PreviewModule& previews)
 {
     GError* error = nullptr;
     GStatBuf status;
@@ -139,9 +140,9 @@ Result<Pages> readText(const std::string& path)
     if (!g_file_get_contents(path.c_str(), &bytes, &length, &error))
         return printingError(textKey("The document could not be read."), error);
     const std::unique_ptr<char, decltype(&g_free)> owned(bytes, g_free);
-    const std::unique_ptr<char, decltype(&g_free)> valid(
-        g_utf8_make_valid(bytes, static_cast<gssize>(length)), g_free);
-    return Pages(std::make_shared<TextPages>(valid.get()));
+    using platform::components::decodedText;
+    return Pages(
+        std::make_shared<TextPages>(decodedText({bytes, length}, platform::TextEnd::Whole, previews)));
 }
 
 } // namespace
@@ -176,7 +177,7 @@ Result<Pages> readPrintablePages(const std::string& path, PrintableKind kind, co
     case PrintableKind::Text:
         break;
     }
-    return readText(path);
+    return readText(path, previews);
 }
 
 } // namespace host::gtk

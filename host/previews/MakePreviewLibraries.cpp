@@ -4,6 +4,7 @@
 #include "host/previews/PdfPrinting.h"
 #include "host/previews/PopplerDocuments.h"
 #include "host/previews/TextNative.h"
+#include "host/previews/UchardetDecoder.h"
 
 namespace host::previews {
 
@@ -15,6 +16,7 @@ using gtk::PreviewNative;
 class Libraries : public gtk::PreviewLibraries {
 public:
     const platform::PagedDocumentOpener& pagedDocuments() const override { return _documents; }
+    const platform::TextDecoder& textDecoder() const override { return _decoder; }
     platform::Result<std::shared_ptr<gtk::PrintablePages>> readPrintablePdf(
         const std::string& path) const override
     {
@@ -33,6 +35,7 @@ public:
 
 private:
     PopplerDocuments _documents;
+    UchardetDecoder _decoder;
 };
 
 } // namespace

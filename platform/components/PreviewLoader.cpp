@@ -129,7 +129,7 @@ PreviewContent textContent(PreviewContent content, const Reading& reading, bool 
     const bool isCut = count > limit;
     bytes.resize(isCut ? limit : count);
     content.kind = Kind::Text;
-    const auto decoded = decodedText(bytes, isCut ? TextEnd::Cut : TextEnd::Whole);
+    const auto decoded = decodedText(bytes, isCut ? TextEnd::Cut : TextEnd::Whole, services().textDecoder());
     content.text = withoutLongLines(decoded, reading.limits.maxLineBytes);
     content.isSource = !isPlain;
     content.note = textNote(count == 0, isCut, content.text != decoded);

@@ -128,15 +128,26 @@ std::string_view withoutCutCharacter(std::string_view bytes)
     return bytes;
 }
 
-std::string fromUtf8OrWindows1252(std::string_view bytes, TextEnd end)
+/// Japanese mail switches between alphabets of ASCII bytes, which is well-formed UTF-8 as well.
+bool switchesAlphabets(std::string_view bytes)
+{
+    return bytes.find("\x1B$") != std::string_view::npos;
+}
+
+std::string fromUtf8OrOlder(std::string_view bytes, TextEnd end, const TextDecoder& older)
 {
     const auto whole = end == TextEnd::Cut ? withoutCutCharacter(bytes) : bytes;
-    return isValidUtf8(whole) ? std::string(whole) : fromWindows1252(bytes);
+    const bool isUtf8 = isValidUtf8(whole);
+    if (isUtf8 && !switchesAlphabets(whole))
+        return std::string(whole);
+    if (auto text = older.decode(bytes, end))
+        return *std::move(text);
+    return isUtf8 ? std::string(whole) : fromWindows1252(bytes);
 }
 
 } // namespace
 
-std::string decodedText(std::string_view bytes, TextEnd end)
+std::string decodedText(std::string_view bytes, TextEnd end, const TextDecoder& older)
 {
     using namespace std::string_view_literals;
     std::string text;
@@ -151,7 +162,7 @@ std::string decodedText(std::string_view bytes, TextEnd end)
     else if (const auto order = guessedByteOrder(bytes))
         text = fromUtf16(bytes, *order);
     else
-        text = fromUtf8OrWindows1252(bytes.starts_with("\xEF\xBB\xBF") ? bytes.substr(3) : bytes, end);
+        text = fromUtf8OrOlder(bytes.starts_with("\xEF\xBB\xBF") ? bytes.substr(3) : bytes, end, older);
     std::erase(text, '\0');
     return text;
 }

@@ -1,8 +1,12 @@
 #include "browser/NavController.h"
 #include "items/FileUtils.h"
+#include "platform/components/DocumentInteractionSheet.h"
 #include "platform/components/DocumentListController.h"
 #include "platform/components/MoveTargetPicker.h"
+#include "platform/components/PreviewScreenView.h"
+#include "platform/components/PreviewSummaryView.h"
 #include "platform/ui/AlertController.h"
+#include "platform/ui/Button.h"
 #include "platform/ui/NavigationItem.h"
 #include "platform/ui/SearchPresentation.h"
 #include "preview/LookwellItemController.h"
@@ -137,6 +141,23 @@ TEST_F(WarpTest, ThePreviewedDocumentIsShownAnew)
     EXPECT_EQ(shownItem(), url("Folder/renamed.txt"));
     EXPECT_TRUE(LookwellItemController::defaultController()->isVisible());
     EXPECT_TRUE(browser->itemManager()->filePresenterRegistered());
+}
+
+TEST_F(WarpTest, APreviewThatCannotShowADocumentOffersOtherApps)
+{
+    using platform::components::PreviewSummaryView;
+    const auto document = write("Folder/data.bin");
+    launch();
+    EXPECT_TRUE(warp("Folder/data.bin"));
+    settle();
+    const auto screen = LookwellItemController::defaultController();
+    const auto shown = std::dynamic_pointer_cast<PreviewSummaryView>(screen->screenView()->content());
+    ASSERT_TRUE(shown && shown->buttons().size() == 1);
+    shown->buttons().front()->press();
+    settle();
+    ASSERT_NE(browser->itemManager()->documentInteractionController(), nullptr);
+    EXPECT_EQ(browser->itemManager()->documentInteractionController()->url(), document);
+    EXPECT_NE(alert(), nullptr) << "its menu";
 }
 
 TEST_F(WarpTest, ADocumentThatOthersTakeAwayClosesItsPreview)

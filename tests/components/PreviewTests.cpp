@@ -1,3 +1,4 @@
+#include "host/previews/UchardetDecoder.h"
 #include "platform/components/PreviewContent.h"
 #include "platform/components/PreviewController.h"
 #include "platform/components/PreviewLoader.h"
@@ -406,6 +407,54 @@ TEST(TextDecoding, UnderstandsTheUsualEncodings)
         {"UTF-32 little-endian", "\xFF\xFE\0\0\xFC\0\0\0"sv, TextEnd::Whole, "ü"},
         {"UTF-32 big-endian, no character", "\0\0\xFE\xFF\0\x11\0\0"sv, TextEnd::Whole, "\uFFFD"},
         {"Windows-1252", "\x93q\x94 \x80", TextEnd::Whole, "“q” €"},
+        {"Shift-JIS",
+            "\223\214\213\236\202\251\202\347\213\236\223s\202\334\202\305\220V\212\262\220\374\202\305\223"
+            "\361\216\236\212\324\201B",
+            TextEnd::Whole, "東京から京都まで新幹線で二時間。"},
+        {"EUC-JP",
+            "\305\354\265\376\244\253\244\351\265\376\305\324\244\336\244\307\277\267\264\264\300\376\244\307"
+            "\306\363\273\376\264\326\241\243",
+            TextEnd::Whole, "東京から京都まで新幹線で二時間。"},
+        {"ISO-2022-JP", "\033$BEl5~$+$i5~ET$^$G!#\033(B", TextEnd::Whole, "東京から京都まで。"},
+        {"EUC-KR",
+            "\274\255\277\357\277\241\274\255 \272\316\273\352\261\356\301\366 \261\342\302\367\267\316 "
+            "\274\274 \275\303\260\243\300\324\264\317\264\331.",
+            TextEnd::Whole, "서울에서 부산까지 기차로 세 시간입니다."},
+        {"GB18030",
+            "\264\323\261\261\276\251\265\275\311\317\272\243\327\370\270\337\314\372\322\252\316\345\270\366"
+            "\320\241\312\261\241\243",
+            TextEnd::Whole, "从北京到上海坐高铁要五个小时。"},
+        {"Big5",
+            "\261q\245x\245_"
+            "\250\354\260\252\266\257\247\244\260\252\305K\255n\250\342\255\323\244p\256\311\241C",
+            TextEnd::Whole, "從台北到高雄坐高鐵要兩個小時。"},
+        {"KOI8-R", "\372\301\315\305\324\313\311 \317 \320\317\305\332\304\313\305", TextEnd::Whole,
+            "Заметки о поездке"},
+        {"Windows-1251", "\307\340\354\345\362\352\350 \356 \357\356\345\347\344\352\345", TextEnd::Whole,
+            "Заметки о поездке"},
+        {"IBM866",
+            "\217\256\245\247\244 \250\247 \214\256\341\252\242\353 \250\244\361\342 "
+            "\347\245\342\353\340\245 \347\240\341\240.",
+            TextEnd::Whole, "Поезд из Москвы идёт четыре часа."},
+        {"Windows-1250",
+            "P\370\355li\232 \236lu\235ou\350k\375 k\371\362 \372p\354l \357\341belsk\351 \363dy.",
+            TextEnd::Whole, "Příliš žluťoučký kůň úpěl ďábelské ódy."},
+        {"Windows-1253",
+            "\324\357 \364\361\335\355\357 \341\360\374 \364\347\355 \301\350\336\355\341 "
+            "\352\334\355\345\351 \360\335\355\364\345 \376\361\345\362.",
+            TextEnd::Whole, "Το τρένο από την Αθήνα κάνει πέντε ώρες."},
+        {"Windows-1255",
+            "\344\370\353\341\372 \356\372\354 \340\341\351\341 \354\351\370\345\371\354\351\355 "
+            "\360\345\361\362\372 \371\362\344.",
+            TextEnd::Whole, "הרכבת מתל אביב לירושלים נוסעת שעה."},
+        {"Windows-1256",
+            "\307\341\336\330\307\321 \343\344 \307\341\336\307\345\321\311 \355\323\312\333\321\336 "
+            "\323\307\332\312\355\344.",
+            TextEnd::Whole, "القطار من القاهرة يستغرق ساعتين."},
+        {"Shift-JIS cut within a character",
+            "\223\214\213\236\202\251\202\347\213\236\223s\202\334\202\305\220V\212\262\220\374\202\305\223"
+            "\361\216\236\212",
+            TextEnd::Cut, "東京から京都まで新幹線で二時"},
         {"UTF-16 with a lone surrogate", "\xFE\xFF\xDE\x00\0a"sv, TextEnd::Whole, "\uFFFDa"},
         {"UTF-16 with half a unit", "\xFF\xFEh\0i"sv, TextEnd::Whole, "h"},
         {"UTF-8 cut within a character", "ab\xE2\x82", TextEnd::Cut, "ab"},
@@ -415,10 +464,11 @@ TEST(TextDecoding, UnderstandsTheUsualEncodings)
         {"NUL characters", "a\0b"sv, TextEnd::Whole, "ab"},
         {"nothing", "", TextEnd::Cut, ""},
     };
+    const host::previews::UchardetDecoder older;
     for (const auto& row : rows) {
         SCOPED_TRACE(row.name);
-        EXPECT_EQ(decodedText(row.bytes, row.end), row.text);
-        EXPECT_TRUE(isValidUtf8(decodedText(row.bytes, row.end)));
+        EXPECT_EQ(decodedText(row.bytes, row.end, older), row.text);
+        EXPECT_TRUE(isValidUtf8(decodedText(row.bytes, row.end, older)));
     }
 }
 

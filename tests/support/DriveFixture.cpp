@@ -3,6 +3,8 @@
 #include "host/drive/AccountRecord.h"
 #include "host/drive/ItemFacts.h"
 #include "host/drive/LinkRecords.h"
+#include "host/previews/PopplerDocuments.h"
+#include "host/previews/UchardetDecoder.h"
 #include "host/system/GdkPixbufImageLoader.h"
 #include "host/system/GettextLocalization.h"
 #include "host/system/IcuFormatters.h"
@@ -11,7 +13,6 @@
 #include "host/system/JsonUserDefaults.h"
 #include "host/system/LocalFileCoordinator.h"
 #include "host/system/MimeTypeRegistry.h"
-#include "host/previews/PopplerDocuments.h"
 #include "host/system/PosixFileSystem.h"
 #include "host/system/TypePreviewSupport.h"
 #include "host/system/UnicodeCharacterData.h"
@@ -76,6 +77,7 @@ DriveFixture::DriveFixture()
             }});
     set.characterData = std::make_shared<host::system::UnicodeCharacterData>();
     set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
+    set.textDecoder = std::make_shared<host::previews::UchardetDecoder>();
     set.pagedDocumentOpener = std::make_shared<host::previews::PopplerDocuments>();
     set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
     set.localization = englishTexts();

@@ -53,6 +53,7 @@ BrowserFixture::BrowserFixture()
     set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
     set.imageLoader = borrowed(_driveServices.imageLoader());
     set.pagedDocumentOpener = borrowed(_driveServices.pagedDocumentOpener());
+    set.textDecoder = borrowed(_driveServices.textDecoder());
     set.keyValueStore = borrowed(_driveServices.keyValueStore());
     set.keyedArchiver = borrowed(_driveServices.keyedArchiver());
     set.localization = englishTexts();

@@ -94,6 +94,7 @@ ComponentsFixture::ComponentsFixture()
     _set.nameSearch = borrowed(_driveServices.nameSearch());
     _set.notificationCenter = drive.notifications;
     _set.pagedDocumentOpener = borrowed(_driveServices.pagedDocumentOpener());
+    _set.textDecoder = borrowed(_driveServices.textDecoder());
     _set.previewSupport = borrowed(_driveServices.previewSupport());
     _set.storageOfferManager = borrowed(_driveServices.storageOfferManager());
     _set.typeRegistry = borrowed(_driveServices.typeRegistry());

@@ -1,0 +1,104 @@
+#include "host/previews/UchardetDecoder.h"
+
+#include <glib.h>
+#include <uchardet.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <memory>
+#include <type_traits>
+
+namespace host::previews {
+
+using platform::TextEnd;
+
+namespace {
+
+/// More does not make the guess better.
+constexpr std::size_t looked = 256U << 10U;
+/// Of a word or two with fewer bytes beyond ASCII the statistics say anything; most of them are Western.
+constexpr std::ptrdiff_t fewestTelling = 6;
+constexpr auto replacement = "\uFFFD";
+
+bool isBeyondAscii(char byte)
+{
+    return (static_cast<unsigned char>(byte) & 0x80U) != 0;
+}
+
+/// Where the standards have control characters, which no text has, Windows has quotes and letters.
+bool hasWindowsSigns(std::string_view bytes)
+{
+    return std::ranges::any_of(
+        bytes, [](char byte) { return (static_cast<unsigned char>(byte) & 0xE0U) == 0x80; });
+}
+
+std::string encodingOf(std::string_view bytes)
+{
+    const std::unique_ptr<std::remove_pointer_t<uchardet_t>, decltype(&uchardet_delete)> detector(
+        uchardet_new(), uchardet_delete);
+    const auto part = bytes.substr(0, looked);
+    if (uchardet_handle_data(detector.get(), part.data(), part.size()) != 0)
+        return {};
+    uchardet_data_end(detector.get());
+    return uchardet_get_charset(detector.get());
+}
+
+/// The pages of Windows that hold the letters of a standard, most of them at its places.
+std::string windowsPage(const std::string& standard)
+{
+    constexpr std::pair<const char*, const char*> pages[] = {{"ISO-8859-1", "WINDOWS-1252"},
+        {"ISO-8859-2", "WINDOWS-1250"}, {"ISO-8859-5", "WINDOWS-1251"}, {"ISO-8859-6", "WINDOWS-1256"},
+        {"ISO-8859-7", "WINDOWS-1253"}, {"ISO-8859-8", "WINDOWS-1255"}, {"ISO-8859-9", "WINDOWS-1254"},
+        {"ISO-8859-13", "WINDOWS-1257"}, {"ISO-8859-15", "WINDOWS-1252"}};
+    const auto* found = std::ranges::find(pages, standard, [](const auto& page) { return page.first; });
+    return found == std::end(pages) ? standard : found->second;
+}
+
+struct CloseConverter {
+    void operator()(GIConv converter) const { g_iconv_close(converter); }
+};
+using Converter = std::unique_ptr<std::remove_pointer_t<GIConv>, CloseConverter>;
+
+std::string converted(const Converter& converter, std::string_view bytes, TextEnd end)
+{
+    std::string text;
+    char* from = const_cast<char*>(bytes.data()); // only read
+    gsize left = bytes.size();
+    while (left > 0) {
+        char piece[4096];
+        char* to = piece;
+        gsize room = sizeof piece;
+        const auto result = g_iconv(converter.get(), &from, &left, &to, &room);
+        const int problem = result == static_cast<gsize>(-1) ? errno : 0;
+        text.append(piece, sizeof piece - room);
+        if (problem == 0 || problem == E2BIG)
+            continue;
+        if (problem == EINVAL && end == TextEnd::Cut)
+            break;
+        text += replacement;
+        ++from;
+        --left;
+    }
+    return text;
+}
+
+} // namespace
+
+std::optional<std::string> UchardetDecoder::decode(std::string_view bytes, TextEnd end) const
+{
+    const bool hasEscapes = bytes.find("\x1B$") != std::string_view::npos;
+    if (!hasEscapes && std::ranges::count_if(bytes, isBeyondAscii) < fewestTelling)
+        return std::nullopt;
+    auto encoding = encodingOf(bytes);
+    if (hasWindowsSigns(bytes))
+        encoding = windowsPage(encoding);
+    // Well-formed UTF-8 does not come here.
+    if (encoding.empty() || encoding.starts_with("UTF-") || encoding == "ASCII")
+        return std::nullopt;
+    auto* opened = g_iconv_open("UTF-8", encoding.c_str());
+    if (opened == reinterpret_cast<GIConv>(-1))
+        return std::nullopt;
+    return converted(Converter(opened), bytes, end);
+}
+
+} // namespace host::previews

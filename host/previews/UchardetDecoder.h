@@ -1,0 +1,13 @@
+#pragma once
+
+#include "platform/TextDecoder.h"
+
+namespace host::previews {
+
+/// Tells encodings by how often which characters follow each other, with uchardet.
+class UchardetDecoder : public platform::TextDecoder {
+public:
+    std::optional<std::string> decode(std::string_view bytes, platform::TextEnd end) const override;
+};
+
+} // namespace host::previews
