@@ -3,14 +3,11 @@
 #include "host/drive/AccountRecord.h"
 #include "platform/Log.h"
 
-#include <algorithm>
 #include <utility>
 
 namespace host::drive {
 
 namespace {
-
-constexpr platform::Duration retryDelay = std::chrono::seconds(2);
 
 std::optional<std::string> currentIdentity(const DriveLayout& layout)
 {
@@ -36,45 +33,20 @@ AccountMonitor::AccountMonitor(const DriveLayout& layout, const DriveDependencie
 {
 }
 
-bool AccountMonitor::watch()
-{
-    // The folder is watched rather than the file, so that its creation and its replacement are seen.
-    _watcher = std::make_unique<host::system::FolderWatcher>([weak = weak_from_this()](const auto& names) {
-        if (const auto self = weak.lock())
-            std::ranges::for_each(names, [&](const auto& name) { self->nameChanged(name); });
-    });
-    return _watcher->watch(_layout.home());
-}
-
 void AccountMonitor::begin()
 {
     static constexpr platform::Operation op{"-[AccountMonitor begin]"};
-    if (!watch()) {
+    // The folder is watched rather than the file, so that its creation and its replacement are seen.
+    _folder = FollowedFolder::follow(_dispatch, _layout.home(), FollowedFolder::IfMissing::Wait,
+        [weak = weak_from_this()](const auto& names) {
+            const auto self = weak.lock();
+            if (self && mayHaveChanged(names, DriveLayout::accountFileName))
+                self->check();
+        });
+    if (!_folder->isWatched())
         op.warning("Cannot watch the account's folder %@", _layout.home());
-        watchLater();
-    }
     // Read after the watch began, so that no change falls between the two.
     _identity = currentIdentity(_layout);
-}
-
-// The folder went away, as when its volume was taken off; it may come back.
-void AccountMonitor::watchLater()
-{
-    _dispatch->after(retryDelay, _dispatch->mainQueue(), [weak = weak_from_this()] {
-        const auto self = weak.lock();
-        if (self && self->watch())
-            self->check();
-        else if (self)
-            self->watchLater();
-    });
-}
-
-void AccountMonitor::nameChanged(const std::string& name)
-{
-    if (name.empty() && !watch())
-        watchLater();
-    if (name.empty() || name == DriveLayout::accountFileName)
-        check();
 }
 
 void AccountMonitor::check()

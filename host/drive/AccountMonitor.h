@@ -2,7 +2,7 @@
 
 #include "host/drive/DriveDependencies.h"
 #include "host/drive/DriveLayout.h"
-#include "host/system/FolderWatcher.h"
+#include "host/drive/FollowedFolder.h"
 #include "platform/Dispatch.h"
 #include "platform/NotificationCenter.h"
 
@@ -31,16 +31,13 @@ private:
     AccountMonitor(const DriveLayout& layout, const DriveDependencies& dependencies);
 
     void begin();
-    bool watch();
-    void watchLater();
-    void nameChanged(const std::string& name);
     void identityRead(std::optional<std::string> identity);
 
     DriveLayout _layout;
     std::shared_ptr<platform::Dispatch> _dispatch;
     std::shared_ptr<platform::NotificationCenter> _notifications;
     std::shared_ptr<platform::Queue> _queue;
-    std::unique_ptr<host::system::FolderWatcher> _watcher;
+    std::shared_ptr<FollowedFolder> _folder;
     std::function<void()> _fileChanged;
     std::optional<std::string> _identity;
     bool _checkIsWaiting = false;

@@ -6,8 +6,6 @@
 #include "platform/CloudDocumentService.h"
 #include "platform/Log.h"
 
-#include <sys/stat.h>
-
 #include <algorithm>
 #include <filesystem>
 #include <utility>
@@ -18,8 +16,6 @@ namespace {
 
 using platform::ActivityOffer;
 using platform::Date;
-
-constexpr platform::Duration retryDelay = std::chrono::seconds(2);
 
 /// The clocks of two devices differ: a time ahead of ours is as good as one behind.
 bool isRecent(Date time, Date now)
@@ -113,36 +109,13 @@ void LocalActivityHandOver::begin()
             if (const auto self = weak.lock())
                 self->readAgain();
         });
-    if (watch())
+    _folder = FollowedFolder::follow(_dispatch, _layout.activities(), FollowedFolder::IfMissing::Make,
+        [weak = weak_from_this()](const auto&) {
+            if (const auto self = weak.lock())
+                self->readAgain();
+        });
+    if (_folder->isWatched())
         readAgain();
-    else
-        watchLater();
-}
-
-bool LocalActivityHandOver::watch()
-{
-    ::mkdir(_layout.activities().c_str(), 0700); // the watch tells when this failed
-    _watcher = std::make_unique<host::system::FolderWatcher>([weak = weak_from_this()](const auto& names) {
-        const auto self = weak.lock();
-        if (!self)
-            return;
-        // An empty name: the folder may have gone.
-        if (std::ranges::find(names, std::string()) != names.end() && !self->watch())
-            self->watchLater();
-        self->readAgain();
-    });
-    return _watcher->watch(_layout.activities());
-}
-
-void LocalActivityHandOver::watchLater()
-{
-    _dispatch->after(retryDelay, _dispatch->mainQueue(), [weak = weak_from_this()] {
-        const auto self = weak.lock();
-        if (self && self->watch())
-            self->readAgain();
-        else if (self)
-            self->watchLater();
-    });
 }
 
 void LocalActivityHandOver::readAgain()

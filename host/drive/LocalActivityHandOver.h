@@ -4,7 +4,7 @@
 #include "host/drive/ActivityRecord.h"
 #include "host/drive/DriveDependencies.h"
 #include "host/drive/DriveLayout.h"
-#include "host/system/FolderWatcher.h"
+#include "host/drive/FollowedFolder.h"
 #include "platform/ActivityHandOver.h"
 #include "platform/Error.h"
 #include "platform/NotificationCenter.h"
@@ -43,8 +43,6 @@ private:
         std::shared_ptr<platform::CloudDocumentService> cloud);
 
     void begin();
-    bool watch();
-    void watchLater();
     void readAgain();
     void recordsRead(Records records);
     void documentDecided(
@@ -58,7 +56,7 @@ private:
     std::shared_ptr<platform::CloudDocumentService> _cloud;
     std::shared_ptr<platform::Queue> _queue;
     std::shared_ptr<ActivityPublication> _publication;
-    std::unique_ptr<host::system::FolderWatcher> _watcher;
+    std::shared_ptr<FollowedFolder> _folder;
     platform::Observation _identity;
     std::vector<platform::ActivityOffer> _offers, _found;
     std::size_t _undecided = 0; ///< records of the latest reading whose documents are looked for

@@ -37,7 +37,7 @@ public:
     /// Hands the content of a downloaded document over to the store and leaves a promise. One that is
     /// promised already is no error; folders cannot be evicted (FileErrorCode::Unsupported), nor a document
     /// beside a promise of another content (FileErrorCode::ItemExists).
-    std::optional<platform::Error> evictItem(const std::string& path);
+    virtual std::optional<platform::Error> evictItem(const std::string& path);
 
 private:
     int removeLocated(const LocatedItem& item);

@@ -4,8 +4,6 @@
 #include "host/drive/SmallFile.h"
 #include "platform/Log.h"
 
-#include <algorithm>
-
 namespace host::drive {
 
 namespace {
@@ -14,8 +12,6 @@ using nlohmann::json;
 using platform::PropertyArray;
 using platform::PropertyDictionary;
 using platform::PropertyValue;
-
-constexpr platform::Duration retryDelay = std::chrono::seconds(2);
 
 PropertyValue valueOf(const json& value);
 
@@ -93,40 +89,15 @@ LocalKeyValueStore::LocalKeyValueStore(const DriveLayout& layout, const DriveDep
 void LocalKeyValueStore::begin()
 {
     static constexpr platform::Operation op{"-[LocalKeyValueStore begin]"};
-    if (watch())
-        return;
-    op.warning("Cannot watch the key-value store's folder %@", _layout.home());
-    watchLater();
-}
-
-bool LocalKeyValueStore::watch()
-{
     // The folder is watched rather than the file, so that its creation and its replacement are seen.
-    _watcher = std::make_unique<host::system::FolderWatcher>([weak = weak_from_this()](const auto& names) {
-        if (const auto self = weak.lock())
-            std::ranges::for_each(names, [&](const auto& name) { self->nameChanged(name); });
-    });
-    return _watcher->watch(_layout.home());
-}
-
-// The folder went away, as when its volume was taken off; it may come back.
-void LocalKeyValueStore::watchLater()
-{
-    _dispatch->after(retryDelay, _dispatch->mainQueue(), [weak = weak_from_this()] {
-        const auto self = weak.lock();
-        if (self && self->watch())
-            self->readAgain();
-        else if (self)
-            self->watchLater();
-    });
-}
-
-void LocalKeyValueStore::nameChanged(const std::string& name)
-{
-    if (name.empty() && !watch())
-        watchLater();
-    if (name.empty() || name == DriveLayout::keyValueFileName)
-        readAgain();
+    _folder = FollowedFolder::follow(_dispatch, _layout.home(), FollowedFolder::IfMissing::Wait,
+        [weak = weak_from_this()](const auto& names) {
+            const auto self = weak.lock();
+            if (self && mayHaveChanged(names, DriveLayout::keyValueFileName))
+                self->readAgain();
+        });
+    if (!_folder->isWatched())
+        op.warning("Cannot watch the key-value store's folder %@", _layout.home());
 }
 
 void LocalKeyValueStore::readAgain()

@@ -2,7 +2,7 @@
 
 #include "host/drive/DriveDependencies.h"
 #include "host/drive/DriveLayout.h"
-#include "host/system/FolderWatcher.h"
+#include "host/drive/FollowedFolder.h"
 #include "platform/Dispatch.h"
 #include "platform/KeyValueStore.h"
 #include "platform/NotificationCenter.h"
@@ -32,9 +32,6 @@ private:
     LocalKeyValueStore(const DriveLayout& layout, const DriveDependencies& dependencies);
 
     void begin();
-    bool watch();
-    void watchLater();
-    void nameChanged(const std::string& name);
     void readAgain();
     void valuesRead(platform::PropertyDictionary values);
 
@@ -42,7 +39,7 @@ private:
     std::shared_ptr<platform::Dispatch> _dispatch;
     std::shared_ptr<platform::NotificationCenter> _notifications;
     std::shared_ptr<platform::Queue> _queue;
-    std::unique_ptr<host::system::FolderWatcher> _watcher;
+    std::shared_ptr<FollowedFolder> _folder;
     const std::shared_ptr<std::atomic_bool> _readingWaits = std::make_shared<std::atomic_bool>(false);
     mutable std::mutex _mutex;
     mutable std::optional<platform::PropertyDictionary> _values; ///< nothing before the first reading
