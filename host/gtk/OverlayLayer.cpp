@@ -1,7 +1,5 @@
 #include "host/gtk/OverlayLayer.h"
 
-#include <adwaita.h>
-
 #include <utility>
 
 namespace host::gtk {
@@ -37,23 +35,21 @@ OverlayLayer::OverlayLayer(GtkOverlay* overlay, std::unique_ptr<LayerContent> co
     std::function<void()> onOutside)
     : _overlay(ObjectRef<GtkOverlay>::retain(overlay))
     , _content(std::move(content))
-    , _revealer(ObjectRef<GtkWidget>::retain(gtk_revealer_new()))
-    , _backdrop(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0))
+    , _backdrop(ObjectRef<GtkWidget>::retain(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0)))
     , _card(_content->widget())
 {
     place(layerPlace);
     connectOutside(std::move(onOutside));
-    gtk_revealer_set_child(GTK_REVEALER(_revealer.get()), _backdrop);
-    gtk_revealer_set_transition_type(GTK_REVEALER(_revealer.get()), GTK_REVEALER_TRANSITION_TYPE_CROSSFADE);
-    gtk_overlay_add_overlay(overlay, _revealer.get());
+    // Not a revealer: what it holds takes no key before the first frame.
+    gtk_overlay_add_overlay(overlay, _backdrop.get());
 }
 
 OverlayLayer::~OverlayLayer()
 {
-    _onRevealed.disconnect();
+    _onFaded.disconnect();
     _onPressed.disconnect();
-    if (gtk_widget_get_parent(_revealer.get()) == GTK_WIDGET(_overlay.get()))
-        gtk_overlay_remove_overlay(_overlay.get(), _revealer.get());
+    if (gtk_widget_get_parent(_backdrop.get()) == GTK_WIDGET(_overlay.get()))
+        gtk_overlay_remove_overlay(_overlay.get(), _backdrop.get());
     // The content takes its own widgets apart while they still stand in the layer.
     _content.reset();
 }
@@ -62,7 +58,7 @@ void OverlayLayer::place(LayerPlace layerPlace)
 {
     gtk_widget_add_css_class(_card, "layer-card");
     gtk_widget_set_overflow(_card, GTK_OVERFLOW_HIDDEN);
-    gtk_widget_add_css_class(_backdrop, "layer-backdrop");
+    gtk_widget_add_css_class(_backdrop.get(), "layer-backdrop");
     GtkWidget* placed = _card;
     switch (layerPlace) {
     case LayerPlace::Center:
@@ -85,17 +81,17 @@ void OverlayLayer::place(LayerPlace layerPlace)
         gtk_widget_add_css_class(_card, "cover");
         break;
     }
-    gtk_box_append(GTK_BOX(_backdrop), placed);
+    gtk_box_append(GTK_BOX(_backdrop.get()), placed);
 }
 
 void OverlayLayer::connectOutside(std::function<void()> onOutside)
 {
     auto* click = gtk_gesture_click_new();
     gtk_event_controller_set_propagation_phase(GTK_EVENT_CONTROLLER(click), GTK_PHASE_CAPTURE);
-    gtk_widget_add_controller(_backdrop, GTK_EVENT_CONTROLLER(click));
+    gtk_widget_add_controller(_backdrop.get(), GTK_EVENT_CONTROLLER(click));
     _onPressed = connectSignal<void(int, double, double)>(
         click, "released", [this, call = std::move(onOutside)](int, double x, double y) {
-            auto* hit = gtk_widget_pick(_backdrop, x, y, GTK_PICK_DEFAULT);
+            auto* hit = gtk_widget_pick(_backdrop.get(), x, y, GTK_PICK_DEFAULT);
             const bool inside = hit && (hit == _card || gtk_widget_is_ancestor(hit, _card));
             if (const auto outside = call; !inside && outside)
                 outside();
@@ -104,32 +100,38 @@ void OverlayLayer::connectOutside(std::function<void()> onOutside)
 
 void OverlayLayer::show(bool animated, Done done)
 {
-    reveal(true, animated, std::move(done));
+    gtk_widget_set_opacity(_backdrop.get(), 0);
+    fadeTo(1, animated, std::move(done));
 }
 
 void OverlayLayer::hide(bool animated, Done done)
 {
-    gtk_widget_set_can_target(_revealer.get(), FALSE);
-    reveal(false, animated, std::move(done));
+    gtk_widget_set_can_target(_backdrop.get(), FALSE);
+    fadeTo(0, animated, std::move(done));
 }
 
-void OverlayLayer::reveal(bool revealed, bool animated, Done done)
+void OverlayLayer::fadeTo(double opacity, bool animated, Done done)
 {
-    auto* revealer = GTK_REVEALER(_revealer.get());
-    _onRevealed.disconnect();
+    _onFaded.disconnect();
     if (const auto earlier = std::exchange(_done, {}))
         earlier();
-    gtk_revealer_set_transition_duration(revealer, animated ? fadeMilliseconds : 0);
-    gtk_revealer_set_reveal_child(revealer, revealed);
-    if ((gtk_revealer_get_child_revealed(revealer) != FALSE) == revealed || !animated) {
+    auto* backdrop = _backdrop.get();
+    if (!animated) {
+        gtk_widget_set_opacity(backdrop, opacity);
         done();
         return;
     }
     _done = std::move(done);
-    _onRevealed = connectNotify(revealer, "notify::child-revealed", [this] {
+    auto* target = adw_callback_animation_target_new(
+        [](double value, gpointer widget) { gtk_widget_set_opacity(GTK_WIDGET(widget), value); }, backdrop,
+        nullptr);
+    _fade = ObjectRef<AdwAnimation>::adopt(adw_timed_animation_new(
+        backdrop, gtk_widget_get_opacity(backdrop), opacity, fadeMilliseconds, target));
+    _onFaded = connectSignal<void()>(_fade.get(), "done", [this] {
         if (const auto ended = std::exchange(_done, {}))
             ended();
     });
+    adw_animation_play(_fade.get());
 }
 
 void OverlayLayer::focus()
@@ -139,8 +141,8 @@ void OverlayLayer::focus()
 
 void OverlayLayer::setCovered(bool covered)
 {
-    gtk_widget_set_can_focus(_revealer.get(), !covered);
-    gtk_widget_set_can_target(_revealer.get(), !covered);
+    gtk_widget_set_can_focus(_backdrop.get(), !covered);
+    gtk_widget_set_can_target(_backdrop.get(), !covered);
 }
 
 } // namespace host::gtk

@@ -5,6 +5,8 @@
 #include "host/gtk/PresentedLayer.h"
 #include "host/gtk/Signal.h"
 
+#include <adwaita.h>
+
 #include <memory>
 
 namespace host::gtk {
@@ -33,14 +35,15 @@ public:
 private:
     void place(LayerPlace place);
     void connectOutside(std::function<void()> onOutside);
-    void reveal(bool revealed, bool animated, Done done);
+    void fadeTo(double opacity, bool animated, Done done);
 
     ObjectRef<GtkOverlay> _overlay;
     std::unique_ptr<LayerContent> _content;
-    ObjectRef<GtkWidget> _revealer;
-    GtkWidget *_backdrop = nullptr, *_card = nullptr;
+    ObjectRef<GtkWidget> _backdrop;
+    GtkWidget* _card = nullptr;
+    ObjectRef<AdwAnimation> _fade;
     Done _done;
-    SignalConnection _onRevealed, _onPressed;
+    SignalConnection _onFaded, _onPressed;
 };
 
 } // namespace host::gtk

@@ -69,13 +69,36 @@ void SearchContent::buildBar(const ui::SearchPresentation& search)
         if (const auto edited = _search.lock())
             edited->userEditedQuery(gtk_editable_get_text(GTK_EDITABLE(_entry)));
     });
+    _connections.push_back(connectSignal<void()>(_entry, "activate", [weak = _search] {
+        if (const auto pressed = weak.lock())
+            pressed->userPressedReturn();
+    }));
+    connectKeys();
     _connections.push_back(connectSignal<void()>(_entry, "stop-search", cancel));
     _connections.push_back(connectSignal<void()>(_cancel, "clicked", cancel));
 }
 
+/// The results may come after the key that goes there.
+void SearchContent::connectKeys()
+{
+    auto* keys = gtk_event_controller_key_new();
+    gtk_event_controller_set_propagation_phase(keys, GTK_PHASE_CAPTURE);
+    gtk_widget_add_controller(_entry, keys);
+    _connections.push_back(connectSignal<gboolean(guint, guint, GdkModifierType)>(
+        keys, "key-pressed", [weak = _search](guint key, guint, GdkModifierType) -> gboolean {
+            const auto search = weak.lock();
+            const bool isDown = key == GDK_KEY_Down || key == GDK_KEY_KP_Down;
+            if (search && isDown)
+                search->userWentDown();
+            return search && isDown;
+        }));
+}
+
 void SearchContent::focus()
 {
-    gtk_widget_grab_focus(_entry);
+    const auto search = _search.lock();
+    if (search && search->hasFocus())
+        gtk_widget_grab_focus(_entry);
 }
 
 } // namespace host::gtk

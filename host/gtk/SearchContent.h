@@ -21,6 +21,7 @@ public:
 
 private:
     class Observer;
+    void connectKeys();
     void buildBar(const platform::ui::SearchPresentation& search);
 
     std::weak_ptr<platform::ui::SearchPresentation> _search;

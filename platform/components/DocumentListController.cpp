@@ -278,10 +278,8 @@ void DocumentListController::startSearchWithQueryStringBecomeFirstResponder(
     });
     const auto presentation = _search->presentation();
     presentation->setQuery(query);
-    presentViewController(presentation, true, [presentation, becomeFirstResponder] {
-        if (becomeFirstResponder)
-            presentation->setFocus(true);
-    });
+    presentation->setFocus(becomeFirstResponder);
+    presentViewController(presentation, true);
 }
 
 void DocumentListController::setAssociatedObject(const std::string& key, std::shared_ptr<void> object)

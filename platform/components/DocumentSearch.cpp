@@ -7,6 +7,7 @@
 #include "platform/components/PlaceholderView.h"
 #include "platform/ui/ListView.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace platform::components {
@@ -73,9 +74,36 @@ void DocumentSearch::begin()
 
 void DocumentSearch::searchQueryDidChange(ui::SearchPresentation&)
 {
+    _ahead = {};
     if (!_session)
         begin();
     _session->setQuery(_presentation->query());
+}
+
+void DocumentSearch::searchResultsWanted(ui::SearchPresentation&)
+{
+    ++_ahead.down;
+    catchUp();
+}
+
+void DocumentSearch::searchResultChosen(ui::SearchPresentation&)
+{
+    _ahead.opens = true;
+    catchUp();
+}
+
+void DocumentSearch::catchUp()
+{
+    const auto rows = _source->rows();
+    const bool isAsked = _ahead.opens || _ahead.down > 0;
+    if (!isAsked || !_isComplete || !rows || rows->count() == 0 || _shownQuery != _presentation->query())
+        return;
+    const auto ahead = std::exchange(_ahead, {});
+    const auto row = std::min(std::max<std::size_t>(ahead.down, 1), rows->count()) - 1;
+    if (ahead.opens)
+        rowActivated(*_results, row);
+    else
+        _results->focusRow(row);
 }
 
 void DocumentSearch::searchDidDisappear(ui::SearchPresentation&)
@@ -97,6 +125,8 @@ void DocumentSearch::resultsArrived(const NameSearchResults& results)
         _results->reloadAll();
     _source->visibleRowsDidChange();
     showState(results);
+    _isComplete = results.isComplete;
+    catchUp();
 }
 
 void DocumentSearch::showState(const NameSearchResults& results)

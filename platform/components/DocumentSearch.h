@@ -43,6 +43,8 @@ public:
 private:
     void build();
     void searchQueryDidChange(ui::SearchPresentation& search) override;
+    void searchResultsWanted(ui::SearchPresentation& search) override;
+    void searchResultChosen(ui::SearchPresentation& search) override;
     void searchDidDisappear(ui::SearchPresentation& search) override;
     void begin();
     void rowActivated(ui::ListView& list, std::size_t index) override;
@@ -50,6 +52,14 @@ private:
     ui::Menu menuForRow(ui::ListView& list, std::size_t index) override;
     void resultsArrived(const NameSearchResults& results);
     void showState(const NameSearchResults& results);
+    /// Does what was typed ahead of the results, once they are there.
+    void catchUp();
+
+    /// What keys in the field asked of the results.
+    struct Ahead {
+        std::size_t down = 0; ///< how often
+        bool opens = false;
+    };
 
     Handlers _handlers;
     std::shared_ptr<ui::SearchPresentation> _presentation;
@@ -58,6 +68,8 @@ private:
     std::shared_ptr<DocumentRowSource> _source;
     std::shared_ptr<NameSearchSession> _session;
     std::string _shownQuery; ///< of the rows that are shown
+    bool _isComplete = false; ///< there will be no other rows for it
+    Ahead _ahead;
 };
 
 } // namespace platform::components

@@ -39,6 +39,18 @@ void SearchPresentation::userEditedQuery(std::string query)
         delegate->searchQueryDidChange(*this);
 }
 
+void SearchPresentation::userWentDown()
+{
+    if (const auto delegate = _delegate.lock())
+        delegate->searchResultsWanted(*this);
+}
+
+void SearchPresentation::userPressedReturn()
+{
+    if (const auto delegate = _delegate.lock())
+        delegate->searchResultChosen(*this);
+}
+
 void SearchPresentation::userCancelled()
 {
     const auto self = std::static_pointer_cast<SearchPresentation>(shared_from_this());

@@ -14,6 +14,10 @@ public:
     virtual void searchQueryDidChange(SearchPresentation& search) = 0;
     /// The user left the search; it is dismissed already.
     virtual void searchWasCancelled(SearchPresentation&) { }
+    /// The keyboard goes down from the field into the results, which may still be on their way.
+    virtual void searchResultsWanted(SearchPresentation&) { }
+    /// The return key in the field, or before the results that it was meant for.
+    virtual void searchResultChosen(SearchPresentation&) { }
     /// The search is not shown any more, for whatever reason.
     virtual void searchDidDisappear(SearchPresentation&) { }
 };
@@ -48,6 +52,8 @@ public:
 
     // Events up.
     void userEditedQuery(std::string query);
+    void userWentDown();
+    void userPressedReturn();
     void userCancelled() override;
 
     void viewDidDisappear(bool animated) override;
