@@ -93,25 +93,29 @@ void PreviewScreenView::setEditBars(
 
 void PreviewScreenView::layoutSubviews()
 {
-    const double width = bounds().width;
-    double top = 0;
-    const auto place = [&](ui::View& view, double height) {
-        view.setFrame({0, top, width, height});
-        top += view.isHidden() ? 0 : height;
+    const double width = bounds().width, height = bounds().height;
+    double top = 0, bottom = height;
+    const auto placeAbove = [&](ui::View& view, double viewHeight) {
+        view.setFrame({0, top, width, viewHeight});
+        top += view.isHidden() ? 0 : viewHeight;
     };
-    place(*_searchBar, PreviewSearchBar::barHeight);
-    place(*_note, noteHeight);
-    const double above = _barAbove && !_barAbove->isHidden() ? PreviewFieldBar::barHeight : 0;
-    const double below = _editBar || !_toolbar->isHidden() ? PreviewToolbar::barHeight : 0;
-    if (_content)
-        place(*_content, std::max(0.0, bounds().height - top - above - below));
-    top = bounds().height - PreviewToolbar::barHeight - above;
-    if (_barAbove)
-        place(*_barAbove, PreviewFieldBar::barHeight);
-    top = bounds().height - PreviewToolbar::barHeight;
-    _toolbar->setFrame({0, top, width, PreviewToolbar::barHeight});
+    const auto placeBelow = [&](ui::View& view, double viewHeight) {
+        view.setFrame({0, bottom - viewHeight, width, viewHeight});
+        bottom -= view.isHidden() ? 0 : viewHeight;
+    };
+    placeAbove(*_searchBar, PreviewSearchBar::barHeight);
+    placeBelow(*_toolbar, PreviewToolbar::barHeight);
     if (_editBar)
-        _editBar->setFrame(_toolbar->frame());
+        placeBelow(*_editBar, PreviewToolbar::barHeight);
+    if (_barAbove)
+        placeBelow(*_barAbove, PreviewFieldBar::barHeight);
+    // What is pointed at stays where it is when something is said about it.
+    if (_editBar)
+        placeBelow(*_note, noteHeight);
+    else
+        placeAbove(*_note, noteHeight);
+    if (_content)
+        _content->setFrame({0, top, width, std::max(0.0, bottom - top)});
 }
 
 } // namespace platform::components

@@ -106,11 +106,11 @@ TEST_F(TouchTests, FingersFillInAFormAndMarkATextThatIsSavedOnLeaving)
     tap("Form.pdf");
     tap("Edit document");
     tap("Next field");
-    const auto isWriting = [this] {
+    const auto isWritingIn = [this](const char* name) {
         const auto entries = program->entries();
-        return !entries.empty() && entries.back().name() == "Your name" && entries.back().isFocused();
+        return !entries.empty() && entries.back().name() == name && entries.back().isFocused();
     };
-    ASSERT_TRUE(eventually(isWriting));
+    ASSERT_TRUE(eventually([&] { return isWritingIn("Your name"); }));
     EXPECT_TRUE(program->entries().back().enter("Ada"));
     tap("Next field");
     tap("agree: Off");
@@ -134,13 +134,19 @@ TEST_F(TouchTests, FingersFillInAFormAndMarkATextThatIsSavedOnLeaving)
     screen().lift(0);
     tap("Highlight");
     EXPECT_TRUE(eventually([&] { return !canHighlight(); }));
+    tap("Add a note");
+    screen().tap({width / 2, 340});
+    ASSERT_TRUE(eventually([&] { return isWritingIn("Note"); }));
+    EXPECT_TRUE(program->entries().back().enter("Ask Ada\nabout it"));
+    tap("Done");
+    EXPECT_TRUE(eventually([this] { return program->dialogs().empty(); }));
     tap("Back");
     const auto holds = [&](const std::string& text) {
         std::ifstream file(form, std::ios::binary);
         const std::string bytes{std::istreambuf_iterator<char>(file), {}};
         return bytes.find(text) != std::string::npos;
     };
-    EXPECT_TRUE(eventually([&] { return holds("(Ada)") && holds("/Highlight"); }));
+    EXPECT_TRUE(eventually([&] { return holds("(Ada)") && holds("/Highlight") && holds("/Subtype /Text"); }));
 }
 
 TEST_F(TouchTests, AFingerAlongTheMarksSelectsARange)
