@@ -28,7 +28,17 @@ Lines linesOf(const DocumentRows& rows)
     return lines;
 }
 
-class LiveList : public testing_support::ComponentsFixture, public testing::WithParamInterface<ListOrder> {
+struct NamedOrder {
+    const char* name;
+    ListOrder order;
+};
+
+void PrintTo(const NamedOrder& row, std::ostream* stream)
+{
+    *stream << row.name;
+}
+
+class LiveList : public testing_support::ComponentsFixture, public testing::WithParamInterface<NamedOrder> {
 protected:
     LiveList() { useRealLister(); }
 
@@ -112,7 +122,7 @@ protected:
     }
     Lines whatIsThere()
     {
-        const auto fresh = follow(GetParam());
+        const auto fresh = follow(GetParam().order);
         waitUntil([&] { return fresh->contents->rows()->count() > 0; });
         return fresh->lines;
     }
@@ -125,7 +135,7 @@ TEST_P(LiveList, ComesToSayWhatAFreshReadingSays)
     drive.makeFolder("Stuff");
     for (int i = 0; i < 50; ++i)
         drive.writeDocument("Stuff/file " + std::to_string(i) + ".txt", std::string(i * 10U, 'x'));
-    const auto list = follow(GetParam());
+    const auto list = follow(GetParam().order);
     ASSERT_TRUE(waitUntil([&] { return list->contents->rows()->count() == 51; }));
     for (int storm = 0; storm < 40; ++storm) {
         for (auto left = _random() % 30; left > 0; --left) {
@@ -143,7 +153,7 @@ TEST_P(LiveList, ComesToSayWhatAFreshReadingSays)
 TEST_P(LiveList, GoesOnWithAnotherFolderAtItsPlace)
 {
     drive.writeDocument("Stuff/old.txt");
-    const auto list = follow(GetParam());
+    const auto list = follow(GetParam().order);
     ASSERT_TRUE(waitUntil([&] { return list->contents->rows()->count() == 2; }));
     std::filesystem::rename(drive.url("Stuff").path(), drive.url("Elsewhere").path());
     drive.writeDocument("Stuff/new.txt");
@@ -154,10 +164,12 @@ TEST_P(LiveList, GoesOnWithAnotherFolderAtItsPlace)
 }
 
 INSTANTIATE_TEST_SUITE_P(InEveryOrder, LiveList,
-    testing::Values(ListOrder{}, ListOrder{OrderKey::Name, OrderDirection::Descending},
-        ListOrder{OrderKey::Name, OrderDirection::Ascending, FolderGrouping::Mixed},
-        ListOrder{OrderKey::Date, OrderDirection::Descending},
-        ListOrder{OrderKey::Size, OrderDirection::Ascending, FolderGrouping::Mixed},
-        ListOrder{OrderKey::Kind, OrderDirection::Descending}));
+    testing::Values(NamedOrder{"Name", {}},
+        NamedOrder{"NameDescending", {OrderKey::Name, OrderDirection::Descending}},
+        NamedOrder{"NameMixed", {OrderKey::Name, OrderDirection::Ascending, FolderGrouping::Mixed}},
+        NamedOrder{"DateDescending", {OrderKey::Date, OrderDirection::Descending}},
+        NamedOrder{"SizeMixed", {OrderKey::Size, OrderDirection::Ascending, FolderGrouping::Mixed}},
+        NamedOrder{"KindDescending", {OrderKey::Kind, OrderDirection::Descending}}),
+    [](const auto& row) { return std::string(row.param.name); });
 
 } // namespace

@@ -23,6 +23,11 @@ struct BadModule {
     const char* contentOf; ///< a file whose content the module has; empty: there is none
 };
 
+void PrintTo(const BadModule& row, std::ostream* stream)
+{
+    *stream << row.name;
+}
+
 class MissingPreviews : public testing_support::WindowFixture,
                         public ::testing::WithParamInterface<BadModule> {
 protected:

@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <filesystem>
+#include <functional>
 
 namespace {
 
@@ -98,6 +99,7 @@ private:
 };
 
 class MeddlingWithMoves : public Meddling { };
+class MeddlingWithCopies : public Meddling { };
 class MeddlingWithFolders : public Meddling { };
 
 TEST_P(Meddling, WhatIsSavedMeanwhileIsKept)
@@ -135,7 +137,7 @@ TEST_P(MeddlingWithMoves, ADocumentUnderTheNewNameIsNeverReplaced)
         [&](const FileCall&) { EXPECT_TRUE(isAllThere(all)); });
 }
 
-TEST_P(MeddlingWithMoves, TheCopyIsAsGoodAsTheOriginalOnceBothWereChanged)
+TEST_P(MeddlingWithCopies, AreAsGoodAsTheOriginalOnceBothWereChanged)
 {
     const Drive both{{document(), saved}, {target(), "saved there"}};
     atEachCall(
@@ -156,20 +158,35 @@ std::string nameOf(const testing::TestParamInfo<sweep_tests::Operation>& row)
     return row.param.name;
 }
 
-std::vector<sweep_tests::Operation> operationsWith(const std::string& argument)
+using Wanted = std::function<bool(const sweep_tests::Operation&)>;
+
+std::vector<sweep_tests::Operation> operationsThat(const Wanted& wanted)
 {
     auto all = sweep_tests::operations();
-    std::erase_if(all, [&](const auto& operation) {
-        return std::ranges::find(operation.arguments, argument) == operation.arguments.end();
-    });
+    std::erase_if(all, std::not_fn(wanted));
     return all;
 }
 
-INSTANTIATE_TEST_SUITE_P(Operations, Meddling, testing::ValuesIn(sweep_tests::operations()), nameOf);
-INSTANTIATE_TEST_SUITE_P(Operations, MeddlingWithMoves, testing::ValuesIn(operationsWith("move")), nameOf);
+Wanted have(const std::string& argument)
+{
+    return [argument](const auto& operation) {
+        return std::ranges::find(operation.arguments, argument) != operation.arguments.end();
+    };
+}
 
+/// Of documents that exist already.
+bool copies(const sweep_tests::Operation& operation)
+{
+    return operation.fileSystems == sweep_tests::FileSystems::Several && have("file.txt")(operation);
+}
+
+INSTANTIATE_TEST_SUITE_P(Operations, Meddling, testing::ValuesIn(sweep_tests::operations()), nameOf);
 INSTANTIATE_TEST_SUITE_P(
-    IntoFolders, MeddlingWithFolders, testing::ValuesIn(operationsWith("target/new.txt")), nameOf);
-INSTANTIATE_TEST_SUITE_P(OfFolders, MeddlingWithFolders, testing::ValuesIn(operationsWith("folder")), nameOf);
+    Operations, MeddlingWithMoves, testing::ValuesIn(operationsThat(have("move"))), nameOf);
+INSTANTIATE_TEST_SUITE_P(Operations, MeddlingWithCopies, testing::ValuesIn(operationsThat(copies)), nameOf);
+INSTANTIATE_TEST_SUITE_P(
+    IntoFolders, MeddlingWithFolders, testing::ValuesIn(operationsThat(have("target/new.txt"))), nameOf);
+INSTANTIATE_TEST_SUITE_P(
+    OfFolders, MeddlingWithFolders, testing::ValuesIn(operationsThat(have("folder"))), nameOf);
 
 } // namespace

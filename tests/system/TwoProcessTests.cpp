@@ -151,6 +151,12 @@ struct Told {
     std::vector<std::string> heard;
 };
 
+void PrintTo(const Told& row, std::ostream* stream)
+{
+    for (const auto& command : row.commands)
+        *stream << (&command == row.commands.data() ? "" : ", ") << command;
+}
+
 class PresenterOfAnotherProcess : public TwoProcessTest, public testing::WithParamInterface<Told> { };
 
 TEST_P(PresenterOfAnotherProcess, isToldOnceAndFollowsItsItem)
