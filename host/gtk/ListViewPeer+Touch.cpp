@@ -10,6 +10,7 @@
 namespace host::gtk {
 
 namespace ui = platform::ui;
+using platform::Point;
 
 namespace {
 
@@ -19,24 +20,40 @@ constexpr platform::Duration pressOn = std::chrono::milliseconds(1200); ///< aft
 
 } // namespace
 
-/// A finger that leaves the place where it came down opens nothing there, even where nothing follows it.
+/// A finger that leaves the place where it came down opens nothing there, even where nothing follows it, nor
+/// do two at once.
 void ListViewPeer::connectStrayingFinger()
 {
-    auto* drag = gtk_gesture_drag_new();
-    gtk_gesture_single_set_touch_only(GTK_GESTURE_SINGLE(drag), TRUE);
-    gtk_event_controller_set_propagation_phase(GTK_EVENT_CONTROLLER(drag), GTK_PHASE_CAPTURE);
-    gtk_widget_add_controller(_listWidget, GTK_EVENT_CONTROLLER(drag));
-    connect(connectSignal<void(double, double)>(
-        drag, "drag-begin", [this](double, double) { _hasStrayed = false; }));
-    const auto follow = [this](double x, double y) { _hasStrayed |= std::hypot(x, y) >= strayed; };
-    connect(connectSignal<void(double, double)>(drag, "drag-update", follow));
-    connect(connectSignal<void(double, double)>(drag, "drag-end", [this, follow](double x, double y) {
-        follow(x, y);
-        // The row hears of the end after this, and a key may activate it later.
-        context().scheduler().scheduleNextFrame(&_hasStrayed, [this] { _hasStrayed = false; });
+    auto* events = gtk_event_controller_legacy_new();
+    gtk_event_controller_set_propagation_phase(events, GTK_PHASE_CAPTURE);
+    gtk_widget_add_controller(native(), events);
+    connect(connectSignal<gboolean(GdkEvent*)>(events, "event", [this](GdkEvent* event) -> gboolean {
+        followFinger(event);
+        return FALSE;
     }));
-    connect(connectSignal<void(GdkEventSequence*)>(
-        drag, "cancel", [this](GdkEventSequence*) { _hasStrayed = false; }));
+}
+
+void ListViewPeer::followFinger(GdkEvent* event)
+{
+    const auto type = gdk_event_get_event_type(event);
+    if (type < GDK_TOUCH_BEGIN || type > GDK_TOUCH_CANCEL)
+        return;
+    const bool isFirst = gdk_touch_event_get_emulating_pointer(event) != FALSE;
+    Point place;
+    gdk_event_get_position(event, &place.x, &place.y);
+    if (type == GDK_TOUCH_BEGIN && isFirst) {
+        _fingers = 0;
+        _fingerStart = place;
+        _hasStrayed = false;
+    }
+    if (type == GDK_TOUCH_BEGIN)
+        ++_fingers;
+    const bool isAway = std::hypot(place.x - _fingerStart.x, place.y - _fingerStart.y) >= strayed;
+    _hasStrayed |= _fingers > 1 || (isFirst && isAway);
+    const bool hasLeft = type == GDK_TOUCH_END || type == GDK_TOUCH_CANCEL;
+    // The row hears of the end after this, and a key may activate it later.
+    if (hasLeft && --_fingers <= 0)
+        context().scheduler().scheduleNextFrame(&_hasStrayed, [this] { _hasStrayed = false; });
 }
 
 /// To draw along the check marks selects or deselects all rows on the way.
@@ -81,7 +98,7 @@ void ListViewPeer::followFingerEvenIfAllIsSeen()
 void ListViewPeer::held(GtkWidget* row, double x, double y)
 {
     const auto list = _list.lock();
-    if (list && !list->holdRow(ListRowWidget::position(row)))
+    if (list && !_hasStrayed && !list->holdRow(ListRowWidget::position(row)))
         showMenuOf(row, x, y);
 }
 

@@ -45,6 +45,7 @@ private:
     void connectInput();
     void connectMarks();
     void connectStrayingFinger();
+    void followFinger(GdkEvent* event);
     void setUpRow(GtkListItem* item);
     void bindRow(GtkListItem* item);
     void activated(guint position);
@@ -89,7 +90,9 @@ private:
     bool _isSplicing = false; ///< rows are not at their final places
     SignalConnection _onScroll;
     platform::ui::TypeAhead _typeAhead;
-    bool _hasStrayed = false; ///< the finger that leaves the screen now did
+    platform::Point _fingerStart; ///< where the first came down
+    int _fingers = 0; ///< that are down
+    bool _hasStrayed = false; ///< they open no row
     int _holds = 0; ///< counts the fingers that held a row, so that an earlier one does not press on
     int _focusKey = 0; ///< its address names the focusing of a row in the scheduler
     int _scrollKey = 0; ///< its address names the second step of a scrolling in the scheduler

@@ -237,13 +237,16 @@ void NavigationPeer::ensurePageBelowTop()
     hideAllButTop();
 }
 
-/// The leaflet does not show its other pages, but leaves them to assistive technology.
+/// The leaflet does not show its other pages, but leaves them to assistive technology, and the one that goes
+/// to fingers.
 void NavigationPeer::hideAllButTop() const
 {
     const auto top = topPage();
-    for (const auto& page : _pages)
+    for (const auto& page : _pages) {
+        gtk_widget_set_can_target(page->widget(), page == top);
         gtk_accessible_update_state(
             GTK_ACCESSIBLE(page->widget()), GTK_ACCESSIBLE_STATE_HIDDEN, page != top ? TRUE : FALSE, -1);
+    }
 }
 
 void NavigationPeer::updateAll()

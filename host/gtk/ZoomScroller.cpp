@@ -60,13 +60,19 @@ void ZoomScroller::addPinch()
     gtk_widget_add_controller(widget(), GTK_EVENT_CONTROLLER(pinch));
     _connections.push_back(connectSignal<void(GdkEventSequence*)>(pinch, "begin", [this, pinch](auto*) {
         _pinchStart = _zoom;
+        _pinched.reset();
         // One of the two fingers has begun to scroll.
         gtk_gesture_set_state(pinch, GTK_EVENT_SEQUENCE_CLAIMED);
     }));
-    _connections.push_back(connectSignal<void(double)>(pinch, "scale-changed", [this, pinch](double scale) {
+    _connections.push_back(connectSignal<void(GdkEventSequence*)>(pinch, "update", [this, pinch](auto*) {
         Point center{_windowSize.width / 2, _windowSize.height / 2};
         gtk_gesture_get_bounding_box_center(pinch, &center.x, &center.y);
-        zoomAt(_pinchStart * scale, center);
+        // What the fingers are on stays between them.
+        if (const auto last = std::exchange(_pinched, center)) {
+            const auto seen = visible();
+            scrollTo({seen.x - center.x + last->x, seen.y - center.y + last->y});
+        }
+        zoomAt(_pinchStart * gtk_gesture_zoom_get_scale_delta(GTK_GESTURE_ZOOM(pinch)), center);
     }));
 }
 

@@ -74,6 +74,7 @@ private:
     platform::Size _windowSize, _base;
     double _zoom = 1, _pinchStart = 1;
     platform::Point _dragStart, _pointer;
+    std::optional<platform::Point> _pinched; ///< the middle of the two fingers
     bool _isPlacing = false;
     std::optional<platform::Point> _wanted; ///< a place to go to once there is a window
     SignalConnections _connections;

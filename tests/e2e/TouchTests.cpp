@@ -69,6 +69,10 @@ TEST_F(TouchTests, AFingerThatMovesOpensNothingAndASwipeGoesBack)
         screen().flick(path);
         screen().drag(path);
     }
+    screen().put(0, {x, y});
+    screen().put(1, placeOf("Tickets"));
+    screen().lift(0);
+    screen().lift(1);
     // Begun and taken back: the screen stays.
     screen().draw({{{x, y}, {x + 150, y}}});
     screen().move(0, {x, y});
