@@ -10,13 +10,6 @@ using Kind = platform::FormField::Kind;
 
 namespace {
 
-std::string taken(char* text)
-{
-    std::string copy = text ? text : "";
-    g_free(text);
-    return copy;
-}
-
 struct FoundField {
     FormField field;
     Object<PopplerFormField> handle;
@@ -52,7 +45,7 @@ bool readText(PopplerFormField* handle, FormField& field)
     if (type == POPPLER_FORM_TEXT_FILE_SELECT)
         return false;
     field.kind = Kind::Text;
-    field.text = taken(poppler_form_field_text_get_text(handle));
+    field.text = takenText(poppler_form_field_text_get_text(handle));
     field.isMultiline = type == POPPLER_FORM_TEXT_MULTILINE;
     field.isSecret = poppler_form_field_text_is_password(handle) != FALSE;
     field.maxLength = static_cast<std::size_t>(std::max(0, poppler_form_field_text_get_max_len(handle)));
@@ -67,12 +60,12 @@ void readChoice(PopplerFormField* handle, FormField& field)
         && poppler_form_field_choice_is_editable(handle) != FALSE;
     const int count = poppler_form_field_choice_get_n_items(handle);
     for (int i = 0; i < count; ++i) {
-        field.options.push_back(taken(poppler_form_field_choice_get_item(handle, i)));
+        field.options.push_back(takenText(poppler_form_field_choice_get_item(handle, i)));
         if (poppler_form_field_choice_is_item_selected(handle, i) != FALSE)
             field.chosen.push_back(static_cast<std::size_t>(i));
     }
     if (field.takesOtherWords)
-        field.text = taken(poppler_form_field_choice_get_text(handle));
+        field.text = takenText(poppler_form_field_choice_get_text(handle));
 }
 
 /// False for what no person fills in.
@@ -81,9 +74,9 @@ bool read(PopplerFormField* handle, FormField& field)
     if (poppler_form_field_is_read_only(handle) != FALSE)
         return false;
     field.id = static_cast<std::uint32_t>(poppler_form_field_get_id(handle));
-    field.name = taken(poppler_form_field_get_alternate_ui_name(handle));
+    field.name = takenText(poppler_form_field_get_alternate_ui_name(handle));
     if (field.name.empty())
-        field.name = taken(poppler_form_field_get_partial_name(handle));
+        field.name = takenText(poppler_form_field_get_partial_name(handle));
     switch (poppler_form_field_get_field_type(handle)) {
     case POPPLER_FORM_FIELD_BUTTON:
         return readButton(handle, field);

@@ -54,14 +54,6 @@ void draw(PopplerPage& page, const Sheet& sheet, std::vector<std::uint32_t>& pix
     cairo_surface_finish(surface.get());
 }
 
-/// The library's string as text; it is freed.
-std::string taken(char* text)
-{
-    std::string copy = text ? text : "";
-    g_free(text);
-    return copy;
-}
-
 PageMark::Kind kindOf(PopplerAnnotType type)
 {
     switch (type) {
@@ -110,7 +102,7 @@ PopplerPages::FoundMark foundMark(PopplerAnnot* annotation, const Rect& place)
     PopplerPages::FoundMark found;
     found.mark.kind = kindOf(type);
     found.mark.place = place;
-    found.mark.text = taken(poppler_annot_get_contents(annotation));
+    found.mark.text = takenText(poppler_annot_get_contents(annotation));
     found.mark.isLocked = (flags & locked) != 0;
     found.handle.reset(static_cast<PopplerAnnot*>(g_object_ref(annotation)));
     found.isSeen = isAdded(type) && (flags & unseen) == 0;
@@ -118,6 +110,13 @@ PopplerPages::FoundMark foundMark(PopplerAnnot* annotation, const Rect& place)
 }
 
 } // namespace
+
+std::string takenText(char* text)
+{
+    std::string copy = text ? text : "";
+    g_free(text);
+    return copy;
+}
 
 Error pagesError(PagesErrorCode code)
 {
@@ -222,7 +221,8 @@ PageText PopplerPages::textBetween(std::size_t index, Point from, Point to) cons
         if (!selected)
             return found;
         auto range = between(from, to);
-        found.text = taken(poppler_page_get_selected_text(selected.get(), POPPLER_SELECTION_GLYPH, &range));
+        found.text =
+            takenText(poppler_page_get_selected_text(selected.get(), POPPLER_SELECTION_GLYPH, &range));
         // A selection alone counts downwards from the top.
         auto* region = poppler_page_get_selected_region(selected.get(), 1, POPPLER_SELECTION_GLYPH, &range);
         for (int i = 0; i < cairo_region_num_rectangles(region); ++i) {

@@ -6,7 +6,9 @@
 
 #include <memory>
 #include <mutex>
+#include <string>
 #include <utility>
+#include <vector>
 
 namespace host::previews {
 
@@ -17,6 +19,8 @@ struct Unref {
 template <typename T>
 using Object = std::unique_ptr<T, Unref<T>>;
 
+/// The library's string as text; it is freed.
+std::string takenText(char* text);
 platform::Error pagesError(platform::PagesErrorCode code);
 
 /// The pages of a document that Poppler has open.

@@ -2,6 +2,7 @@
 
 #include "platform/Localization.h"
 #include "platform/Services.h"
+#include "platform/components/AlertParts.h"
 #include "platform/components/DisplayName.h"
 #include "platform/components/ErrorWords.h"
 #include "platform/components/PreviewContent.h"
@@ -12,10 +13,10 @@
 #include "platform/components/PreviewPagesView.h"
 #include "platform/components/PreviewScreenView.h"
 #include "platform/components/PreviewToolbar.h"
-#include "platform/ui/AlertController.h"
 #include "platform/ui/NavigationController.h"
 
 #include <algorithm>
+#include <cerrno>
 #include <utility>
 
 namespace platform::components {
@@ -24,28 +25,15 @@ namespace {
 
 using Editing = std::shared_ptr<PreviewEditing>;
 
-std::shared_ptr<ui::AlertAction> action(
-    std::string title, ui::AlertActionStyle style, std::function<void()> act = {})
-{
-    return std::make_shared<ui::AlertAction>(std::move(title), style, [act = std::move(act)](const auto&) {
-        if (act)
-            act();
-    });
-}
-
-std::shared_ptr<ui::AlertController> message(const std::string& title, const std::string& words)
-{
-    const auto alert = std::make_shared<ui::AlertController>(title, words, ui::AlertStyle::Alert);
-    alert->addAction(action(localized("OK"), ui::AlertActionStyle::Default));
-    return alert;
-}
-
 std::string whyNotChanged(const Error& error)
 {
     const bool isDamaged =
         error.domain() == errorDomain::pages && error.code() == static_cast<int>(PagesErrorCode::Damaged);
-    return isDamaged ? localized("The document is damaged. It can be read, but not changed.")
-                     : errorWords(error);
+    if (isDamaged)
+        return localized("The document is damaged. It can be read, but not changed.");
+    if (error.domain() == errorDomain::system && error.code() == EFBIG)
+        return localized("The document is too large to be changed here.");
+    return errorWords(error);
 }
 
 std::string nameOf(const Url& url)
@@ -93,7 +81,7 @@ void PreviewController::editingBegan(const Result<Editing>& begun)
         return;
     if (!begun)
         return alert(
-            message(localized("“%@” cannot be changed", {nameOf(*_item)}), whyNotChanged(*begun.error)));
+            messageAlert(localized("“%@” cannot be changed", {nameOf(*_item)}), whyNotChanged(*begun.error)));
     const auto& editing = *begun.value;
     // A reading that is under way would put the document back that is not being changed.
     cancelLoad();
@@ -242,7 +230,7 @@ void PreviewController::kept(const Editing& editing, const EditsKept& outcome)
         _savedVersion.reset();
         if (_item == item)
             refreshCurrentPreviewItem();
-        return alert(message(localized("“%@” was changed by another program", {nameOf(item)}),
+        return alert(messageAlert(localized("“%@” was changed by another program", {nameOf(item)}),
             localized("Your changes are kept in a copy, “%@”.", {nameOf(outcome.place)})));
     }
     case EditsKept::Where::Nowhere:
@@ -258,7 +246,7 @@ void PreviewController::askAfterFailure(const Editing& editing, const EditsKept&
     const auto question =
         std::make_shared<ui::AlertController>(localized("“%@” could not be saved", {nameOf(editing->item())}),
             outcome.error ? whyNotChanged(*outcome.error) : std::string(), ui::AlertStyle::Alert);
-    question->addAction(action(localized("Try Again"), ui::AlertActionStyle::Default, [weak, editing] {
+    question->addAction(alertAction(localized("Try Again"), ui::AlertActionStyle::Default, [weak, editing] {
         if (const auto screen = weak.lock())
             screen->keep(editing);
     }));
@@ -278,14 +266,14 @@ void PreviewController::askForUnsaved(const Editing& editing)
 void PreviewController::addCopyAndDiscard(ui::AlertController& question, const Editing& editing)
 {
     const std::weak_ptr<PreviewController> weak = self();
-    question.addAction(action(localized("Keep a Copy"), ui::AlertActionStyle::Default, [weak, editing] {
+    question.addAction(alertAction(localized("Keep a Copy"), ui::AlertActionStyle::Default, [weak, editing] {
         editing->saveCopy([weak, editing](const EditsKept& outcome) {
             if (const auto screen = weak.lock())
                 screen->keptCopy(editing, outcome);
         });
     }));
     question.addAction(
-        action(localized("Discard Changes"), ui::AlertActionStyle::Destructive, [weak, editing] {
+        alertAction(localized("Discard Changes"), ui::AlertActionStyle::Destructive, [weak, editing] {
             editing->discard();
             if (const auto screen = weak.lock())
                 screen->showOnDisk(editing);
@@ -297,7 +285,7 @@ void PreviewController::keptCopy(const Editing& editing, const EditsKept& outcom
     if (outcome.where == EditsKept::Where::Nowhere)
         return askAfterFailure(editing, outcome);
     showOnDisk(editing);
-    alert(message(
+    alert(messageAlert(
         localized("Your changes are kept"), localized("They are in a copy, “%@”.", {nameOf(outcome.place)})));
 }
 

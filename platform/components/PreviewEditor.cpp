@@ -1,9 +1,9 @@
 #include "platform/components/PreviewEditor.h"
 
 #include "platform/Localization.h"
+#include "platform/components/AlertParts.h"
 #include "platform/components/NoteView.h"
 #include "platform/components/PreviewFieldBar.h"
-#include "platform/ui/AlertController.h"
 #include "platform/ui/Button.h"
 #include "platform/ui/TextField.h"
 
@@ -15,15 +15,6 @@ namespace platform::components {
 namespace {
 
 constexpr double noteSide = 24; ///< page points
-
-std::shared_ptr<ui::AlertAction> action(
-    std::string title, ui::AlertActionStyle style, std::function<void()> act = {})
-{
-    return std::make_shared<ui::AlertAction>(std::move(title), style, [act = std::move(act)](const auto&) {
-        if (act)
-            act();
-    });
-}
 
 std::string markTitle(const PageMark& mark)
 {
@@ -44,23 +35,13 @@ std::string markTitle(const PageMark& mark)
 
 std::shared_ptr<ui::ViewController> makeNoteAlert(const PageMark& mark)
 {
-    const auto alert =
-        std::make_shared<ui::AlertController>(markTitle(mark), mark.text, ui::AlertStyle::Alert);
-    alert->addAction(action(localized("OK"), ui::AlertActionStyle::Default));
-    return alert;
+    return messageAlert(markTitle(mark), mark.text);
 }
 
 std::shared_ptr<PreviewEditor> PreviewEditor::create(std::shared_ptr<PreviewEditing> editing,
     const std::shared_ptr<PreviewPagesView>& pages, Callbacks callbacks)
 {
-    struct Made : PreviewEditor {
-        Made(std::shared_ptr<PreviewEditing> edited, const std::shared_ptr<PreviewPagesView>& view,
-            Callbacks calls)
-            : PreviewEditor(std::move(edited), view, std::move(calls))
-        {
-        }
-    };
-    const auto editor = std::make_shared<Made>(std::move(editing), pages, std::move(callbacks));
+    const auto editor = std::make_shared<PreviewEditor>(std::move(editing), pages, std::move(callbacks));
     editor->connect();
     return editor;
 }
@@ -185,7 +166,8 @@ void PreviewEditor::undo()
 void PreviewEditor::changed(const std::optional<Error>& error)
 {
     if (error)
-        say(localized("This cannot be changed"), localized("The document does not allow it."));
+        _callbacks.present(
+            messageAlert(localized("This cannot be changed"), localized("The document does not allow it.")));
     if (const auto pages = _pages.lock())
         pages->documentDidChange();
     readFields();
@@ -336,11 +318,11 @@ void PreviewEditor::choose(const FormField& field)
         if (!isChosen || !field.takesSeveral)
             chosen.push_back(i);
         std::ranges::sort(chosen);
-        sheet->addAction(action((isChosen ? "✓ " : "") + field.options[i], ui::AlertActionStyle::Default,
+        sheet->addAction(alertAction((isChosen ? "✓ " : "") + field.options[i], ui::AlertActionStyle::Default,
             applying(FieldChoiceEdit{field.page, field.id, chosen})));
     }
     if (field.takesOtherWords)
-        sheet->addAction(action(localized("Other…"), ui::AlertActionStyle::Default, [weak, field] {
+        sheet->addAction(alertAction(localized("Other…"), ui::AlertActionStyle::Default, [weak, field] {
             const auto editor = weak.lock();
             if (!editor)
                 return;
@@ -349,7 +331,7 @@ void PreviewEditor::choose(const FormField& field)
                     asked->apply(FieldTextEdit{field.page, field.id, text});
             });
         }));
-    sheet->addAction(action(localized("Cancel"), ui::AlertActionStyle::Cancel));
+    sheet->addAction(alertAction(localized("Cancel"), ui::AlertActionStyle::Cancel));
     sheet->setPopoverAnchor(ui::ViewAnchor{_fieldBar->button(), _fieldBar->button()->bounds()});
     _callbacks.present(sheet);
 }
@@ -396,8 +378,8 @@ void PreviewEditor::askForText(
     const auto alert = std::make_shared<ui::AlertController>(title, std::string(), ui::AlertStyle::Alert);
     const auto screen = std::make_shared<NoteScreen>(title, text);
     alert->setContentViewController(screen);
-    alert->addAction(action(localized("Cancel"), ui::AlertActionStyle::Cancel));
-    const auto done = action(localized("Done"), ui::AlertActionStyle::Default,
+    alert->addAction(alertAction(localized("Cancel"), ui::AlertActionStyle::Cancel));
+    const auto done = alertAction(localized("Done"), ui::AlertActionStyle::Default,
         [note = screen->note(), written = std::move(written)] { written(note->text()); });
     alert->addAction(done);
     _callbacks.present(alert);
@@ -413,7 +395,7 @@ void PreviewEditor::showMark(std::size_t page, const PageMark& mark)
     const std::weak_ptr<PreviewEditor> weak = weak_from_this();
     const auto alert =
         std::make_shared<ui::AlertController>(markTitle(mark), mark.text, ui::AlertStyle::Alert);
-    alert->addAction(action(mark.text.empty() ? localized("Add Comment") : localized("Change Text"),
+    alert->addAction(alertAction(mark.text.empty() ? localized("Add Comment") : localized("Change Text"),
         ui::AlertActionStyle::Default, [weak, page, mark] {
             const auto editor = weak.lock();
             if (!editor)
@@ -423,18 +405,11 @@ void PreviewEditor::showMark(std::size_t page, const PageMark& mark)
                     asked->apply(MarkTextEdit{page, mark.id, text});
             });
         }));
-    alert->addAction(action(localized("Remove"), ui::AlertActionStyle::Destructive, [weak, page, mark] {
+    alert->addAction(alertAction(localized("Remove"), ui::AlertActionStyle::Destructive, [weak, page, mark] {
         if (const auto editor = weak.lock())
             editor->apply(MarkRemoval{page, mark.id});
     }));
-    alert->addAction(action(localized("Cancel"), ui::AlertActionStyle::Cancel));
-    _callbacks.present(alert);
-}
-
-void PreviewEditor::say(const std::string& title, const std::string& words)
-{
-    const auto alert = std::make_shared<ui::AlertController>(title, words, ui::AlertStyle::Alert);
-    alert->addAction(action(localized("OK"), ui::AlertActionStyle::Default));
+    alert->addAction(alertAction(localized("Cancel"), ui::AlertActionStyle::Cancel));
     _callbacks.present(alert);
 }
 

@@ -27,6 +27,8 @@ public:
     };
     static std::shared_ptr<PreviewEditor> create(std::shared_ptr<PreviewEditing> editing,
         const std::shared_ptr<PreviewPagesView>& pages, Callbacks callbacks);
+    PreviewEditor(std::shared_ptr<PreviewEditing> editing, const std::shared_ptr<PreviewPagesView>& pages,
+        Callbacks callbacks); ///< use create()
     ~PreviewEditor();
 
     const std::shared_ptr<PreviewEditing>& editing() const { return _editing; }
@@ -41,10 +43,6 @@ public:
     void finishWriting();
     /// The person asks to go back: from what is being done, not from the document. False: nothing was.
     bool backRequested();
-
-protected:
-    PreviewEditor(std::shared_ptr<PreviewEditing> editing, const std::shared_ptr<PreviewPagesView>& pages,
-        Callbacks callbacks); ///< use create()
 
 private:
     using Step = void (PreviewEditor::*)();
@@ -66,7 +64,6 @@ private:
     void askForText(
         const std::string& title, const std::string& text, std::function<void(const std::string&)> written);
     void showMark(std::size_t page, const PageMark& mark);
-    void say(const std::string& title, const std::string& words);
 
     std::shared_ptr<PreviewEditing> _editing;
     std::weak_ptr<PreviewPagesView> _pages;

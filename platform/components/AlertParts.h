@@ -1,0 +1,17 @@
+#pragma once
+
+#include "platform/ui/AlertController.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+
+namespace platform::components {
+
+/// A button of an alert that does something, or nothing but to close it.
+std::shared_ptr<ui::AlertAction> alertAction(
+    std::string title, ui::AlertActionStyle style, std::function<void()> act = {});
+/// A message that is closed with OK.
+std::shared_ptr<ui::AlertController> messageAlert(const std::string& title, const std::string& words);
+
+} // namespace platform::components
