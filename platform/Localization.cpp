@@ -12,10 +12,24 @@ namespace platform {
 
 namespace {
 
+/// A name may hold marks that turn the text after them around (U+202A to U+202E); in a sentence they would
+/// turn the sentence, so that they show as the replacement character.
+std::string withoutOverrides(std::string text)
+{
+    constexpr std::string_view lead = "\xE2\x80", replacement = "\xEF\xBF\xBD";
+    for (auto at = text.find(lead); at != std::string::npos; at = text.find(lead, at + lead.size())) {
+        const auto last =
+            at + lead.size() < text.size() ? static_cast<unsigned char>(text[at + lead.size()]) : 0;
+        if (last >= 0xAA && last <= 0xAE)
+            text.replace(at, replacement.size(), replacement);
+    }
+    return text;
+}
+
 std::string argumentText(const TextArgument& argument)
 {
     if (const auto* text = std::get_if<std::string>(&argument))
-        return *text;
+        return withoutOverrides(*text);
     if (const auto* integer = std::get_if<std::int64_t>(&argument))
         return services().formatters().number(*integer);
     std::array<char, 40> buffer{};

@@ -25,7 +25,8 @@ using TextArgument = std::variant<std::string, std::int64_t, double>;
 /// The text of a key, in the user's language.
 std::string localized(const std::string& key);
 /// The text of a key with its placeholders filled: %@, %d, %g, and numbered ones such as %2$@. Numbers are
-/// written with the language's digits.
+/// written with the language's digits; marks in a text that would turn the rest of the sentence around show
+/// as the replacement character.
 std::string localized(const std::string& key, const std::vector<TextArgument>& arguments);
 /// The plural form that the first argument, a number, chooses, with its placeholders filled.
 std::string localizedPlural(const std::string& key, const std::vector<TextArgument>& arguments);

@@ -99,6 +99,8 @@ TEST_F(LocaleTest, OtherLanguagesWithoutTheirLocaleInstalled)
     install({"de_DE:en", "de_DE"});
     EXPECT_FALSE(services().localization().isRightToLeft());
     EXPECT_EQ(localized("The name “%@” is already taken.", {"a"}), "Der Name „a“ ist bereits vergeben.");
+    EXPECT_EQ(localized("The name “%@” is already taken.", {"a\u202Efdp.exe"}),
+        "Der Name „a\uFFFDfdp.exe“ ist bereits vergeben.");
     // A language without a catalogue reads English, from left to right.
     install({"he_IL:en", "he_IL"});
     EXPECT_EQ(localizedPlural(".DICT.ITEMS.%d", {std::int64_t{1}}), "1 item");
