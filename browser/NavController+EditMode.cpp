@@ -69,6 +69,12 @@ void NavController::configureNavBar(const List& list)
     if (!_editMode)
         button->setCompactImage(platform::Image::named("selection-mode-symbolic"));
     list->navigationItem().setRightItem(button);
+    list->navigationItem().setNewAction([weak = std::weak_ptr(self()), shown = std::weak_ptr(list)] {
+        const auto browser = weak.lock();
+        const auto folder = shown.lock();
+        if (browser && folder && MenuEnableChecks::canEnableNewFolderForSelectedItems(*folder))
+            browser->promtForNewFolderAndCreate(nullptr);
+    });
     list->navigationItem().setHidesBackButton(_editMode);
     list->setTitle(_editMode ? platform::localized("Select Items") : _viewTitle);
 }

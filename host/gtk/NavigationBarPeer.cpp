@@ -36,24 +36,45 @@ std::string closeButtonOnly()
     return close < all.find(':') ? "close:" : ":close";
 }
 
-/// Presses a button at once: its own activation lets a quarter of a second pass, and the next keys with it.
-gboolean pressByKey(GtkWidget* button, GVariant*, gpointer)
+/// Whether a person could press something now: it is shown, and nothing lies over it.
+bool isInReach(GtkWidget* widget)
 {
-    const bool isShown = gtk_widget_get_mapped(button) && gtk_widget_is_sensitive(button);
-    if (isShown)
-        g_signal_emit_by_name(button, "clicked");
-    return isShown;
+    bool takesKeys = gtk_widget_get_mapped(widget) && gtk_widget_is_sensitive(widget);
+    for (auto* around = widget; around && takesKeys; around = gtk_widget_get_parent(around))
+        takesKeys = around == widget || gtk_widget_get_can_focus(around);
+    return takesKeys;
 }
 
-/// A key that presses a button wherever the keyboard is, as long as the button is shown.
-void addShortcut(GtkWidget* button, guint key, GdkModifierType modifiers = static_cast<GdkModifierType>(0))
+/// A key that does something wherever the keyboard is, as long as the widget is in reach.
+GtkEventController* addShortcut(
+    GtkWidget* widget, guint key, GdkModifierType modifiers, GtkShortcutFunc does, gpointer data = nullptr)
 {
     auto* shortcuts = gtk_shortcut_controller_new();
     gtk_shortcut_controller_set_scope(GTK_SHORTCUT_CONTROLLER(shortcuts), GTK_SHORTCUT_SCOPE_GLOBAL);
     gtk_shortcut_controller_add_shortcut(GTK_SHORTCUT_CONTROLLER(shortcuts),
         gtk_shortcut_new(
-            gtk_keyval_trigger_new(key, modifiers), gtk_callback_action_new(pressByKey, nullptr, nullptr)));
-    gtk_widget_add_controller(button, shortcuts);
+            gtk_keyval_trigger_new(key, modifiers), gtk_callback_action_new(does, data, nullptr)));
+    gtk_widget_add_controller(widget, shortcuts);
+    return shortcuts;
+}
+
+/// Presses a button at once: its own activation lets a quarter of a second pass, and the next keys with it.
+gboolean pressByKey(GtkWidget* button, GVariant*, gpointer)
+{
+    const bool isPressed = isInReach(button);
+    if (isPressed)
+        g_signal_emit_by_name(button, "clicked");
+    return isPressed;
+}
+
+gboolean callByKey(GtkWidget* bar, GVariant*, gpointer data)
+{
+    // It may take the bar's own handler away.
+    const auto call = *static_cast<std::function<void()>*>(data);
+    const bool isCalled = call && isInReach(bar);
+    if (isCalled)
+        call();
+    return isCalled;
 }
 
 } // namespace
@@ -70,9 +91,11 @@ NavigationBarPeer::NavigationBarPeer(std::shared_ptr<PeerContext> context)
     adw_header_bar_set_title_widget(bar, _title);
     adw_header_bar_pack_start(bar, _back);
     adw_header_bar_pack_end(bar, _menu);
-    addShortcut(_menu, GDK_KEY_F10);
+    addShortcut(_menu, GDK_KEY_F10, static_cast<GdkModifierType>(0), pressByKey);
     adw_header_bar_pack_end(bar, _search);
-    addShortcut(_search, GDK_KEY_f, GDK_CONTROL_MASK);
+    addShortcut(_search, GDK_KEY_f, GDK_CONTROL_MASK, pressByKey);
+    _newKey = addShortcut(widget(), GDK_KEY_n,
+        static_cast<GdkModifierType>(GDK_CONTROL_MASK | GDK_SHIFT_MASK), callByKey, &_onNew);
     _connections.push_back(connectSignal<void()>(_menu, "clicked", [this] {
         if (const auto make = _makeMenu)
             showMenu(_menu, gtk_widget_get_width(_menu) / 2.0, gtk_widget_get_height(_menu), make());
@@ -90,6 +113,7 @@ NavigationBarPeer::NavigationBarPeer(std::shared_ptr<PeerContext> context)
 NavigationBarPeer::~NavigationBarPeer()
 {
     _connections.clear();
+    gtk_widget_remove_controller(widget(), _newKey);
     clearItems();
 }
 
@@ -108,6 +132,7 @@ void NavigationBarPeer::show(const ui::NavigationItem& item, bool hasBackTarget)
 void NavigationBarPeer::showSearch(const ui::NavigationItem& item)
 {
     _onSearch = item.searchAction();
+    _onNew = item.newAction();
     gtk_widget_set_visible(_search, static_cast<bool>(_onSearch));
 }
 

@@ -42,7 +42,8 @@ private:
     GtkWidget *_title, *_back, *_search, *_menu;
     platform::ui::BarButtonItems _left, _right;
     std::vector<std::shared_ptr<BarItemPeer>> _peers;
-    std::function<void()> _onBack, _onSearch;
+    GtkEventController* _newKey = nullptr;
+    std::function<void()> _onBack, _onSearch, _onNew;
     std::function<platform::ui::Menu()> _makeMenu;
     SignalConnections _connections;
     bool _isNarrow = false;

@@ -57,6 +57,12 @@ void NavigationItem::setSearchAction(std::function<void()> action)
     _onChange();
 }
 
+void NavigationItem::setNewAction(std::function<void()> action)
+{
+    _newAction = std::move(action);
+    _onChange();
+}
+
 void NavigationItem::setMenu(std::string name, MenuMaker menu)
 {
     _menuName = std::move(name);

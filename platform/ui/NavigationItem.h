@@ -35,6 +35,10 @@ public:
     const std::function<void()>& searchAction() const { return _searchAction; }
     void setSearchAction(std::function<void()> action);
 
+    /// What the key for something new does (Ctrl+Shift+N); absent: nothing.
+    const std::function<void()>& newAction() const { return _newAction; }
+    void setNewAction(std::function<void()> action);
+
     /// The menu of the bar's menu button, asked for when it is pressed; absent: no such button.
     using MenuMaker = std::function<Menu()>;
     const MenuMaker& menu() const { return _menu; }
@@ -49,7 +53,7 @@ private:
     std::string _title, _subtitle;
     BarButtonItems _leftItems, _rightItems;
     bool _hidesBackButton = false, _leftItemsSupplementBackButton = false;
-    std::function<void()> _searchAction;
+    std::function<void()> _searchAction, _newAction;
     std::string _menuName;
     MenuMaker _menu;
 };

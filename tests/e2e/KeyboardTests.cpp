@@ -85,6 +85,12 @@ TEST_F(KeyboardTests, KeysThatComeAtOnceArriveWhereTheyWereMeant)
         expectDialog(false);
         expectKeyboardAt("To do.txt");
     }
+    pressKey('n', Modifier::ControlAndShift);
+    type("Errands");
+    pressKey(returnKey);
+    EXPECT_TRUE(eventually([this] { return program->shows("Errands"); }));
+    expectKeyboardAt("To do.txt");
+    EXPECT_TRUE(std::filesystem::is_directory(top / "Desktop/Errands"));
     pressKey('f', Modifier::Control);
     type("house");
     pressKey(down);

@@ -189,12 +189,16 @@ void pressKey(unsigned symbol, Modifier modifier)
     const auto send = [](unsigned key, AtspiKeySynthType kind) {
         EXPECT_TRUE(atspi_generate_keyboard_event(static_cast<glong>(key), nullptr, kind, nullptr));
     };
-    const unsigned held = modifier == Modifier::Control ? controlKeycode : shiftKeycode;
-    if (modifier != Modifier::None)
-        send(held, ATSPI_KEY_PRESS);
+    std::vector<unsigned> held;
+    if (modifier == Modifier::Control || modifier == Modifier::ControlAndShift)
+        held.push_back(controlKeycode);
+    if (modifier == Modifier::Shift || modifier == Modifier::ControlAndShift)
+        held.push_back(shiftKeycode);
+    for (const auto key : held)
+        send(key, ATSPI_KEY_PRESS);
     send(symbol, ATSPI_KEY_SYM);
-    if (modifier != Modifier::None)
-        send(held, ATSPI_KEY_RELEASE);
+    for (const auto key : held)
+        send(key, ATSPI_KEY_RELEASE);
 }
 
 void type(const std::string& text)

@@ -56,7 +56,7 @@ private:
     Accessible _tree;
 };
 
-enum class Modifier { None, Control, Shift };
+enum class Modifier { None, Control, Shift, ControlAndShift };
 
 /// A key that the person presses, as a symbol of the X server.
 void pressKey(unsigned symbol, Modifier modifier = Modifier::None);
