@@ -3,7 +3,9 @@
 #include "platform/Dispatch.h"
 #include "platform/Services.h"
 
+#include <map>
 #include <memory>
+#include <mutex>
 #include <utility>
 
 namespace host::previews::SourceLanguages {
@@ -12,11 +14,42 @@ using gtk::ObjectRef;
 
 namespace {
 
-/// Used by the one queue below alone until it is handed to the main thread, which then only reads.
-GtkSourceLanguageManager* manager()
+/// A language with all that its colours need. A manager of its own, because the library's objects know no
+/// threads: once the main thread has it no worker touches it again.
+struct Prepared {
+    ObjectRef<GtkSourceLanguageManager> manager;
+    ObjectRef<GtkSourceLanguage> language;
+    ObjectRef<GtkSourceBuffer> keeper; ///< the description stays as long as some buffer uses it
+};
+
+using Languages = std::map<std::string, std::shared_ptr<const Prepared>>;
+
+std::shared_ptr<const Prepared> prepare(const std::string& identifier)
 {
-    static const auto shared = ObjectRef<GtkSourceLanguageManager>::adopt(gtk_source_language_manager_new());
-    return shared.get();
+    auto prepared = std::make_shared<Prepared>();
+    prepared->manager = ObjectRef<GtkSourceLanguageManager>::adopt(gtk_source_language_manager_new());
+    prepared->language = ObjectRef<GtkSourceLanguage>::retain(
+        gtk_source_language_manager_get_language(prepared->manager.get(), identifier.c_str()));
+    prepared->keeper = ObjectRef<GtkSourceBuffer>::adopt(gtk_source_buffer_new(nullptr));
+    gtk_source_buffer_set_highlight_syntax(prepared->keeper.get(), FALSE);
+    gtk_source_buffer_set_language(prepared->keeper.get(), prepared->language.get());
+    return prepared;
+}
+
+/// One at a time; what was prepared is kept, as are the library's own languages.
+std::shared_ptr<const Prepared> find(const std::string& fileName)
+{
+    static std::mutex mutex;
+    static const auto names = ObjectRef<GtkSourceLanguageManager>::adopt(gtk_source_language_manager_new());
+    static Languages known;
+    const std::lock_guard lock(mutex);
+    auto* found = gtk_source_language_manager_guess_language(names.get(), fileName.c_str(), nullptr);
+    if (!found)
+        return nullptr;
+    auto& prepared = known[gtk_source_language_get_id(found)];
+    if (!prepared)
+        prepared = prepare(gtk_source_language_get_id(found));
+    return prepared;
 }
 
 } // namespace
@@ -27,9 +60,9 @@ void guess(const std::string& fileName, Answer answer)
     const auto queue = dispatch.makeSerialQueue("source languages");
     // The work keeps its own queue until it has run.
     queue->async([queue, fileName, answer = std::move(answer), main = dispatch.mainQueue()] {
-        auto* found = gtk_source_language_manager_guess_language(manager(), fileName.c_str(), nullptr);
-        main->async(
-            [queue, answer, language = ObjectRef<GtkSourceLanguage>::retain(found)] { answer(language); });
+        main->async([queue, answer, prepared = find(fileName)] {
+            answer(prepared ? prepared->language : ObjectRef<GtkSourceLanguage>());
+        });
     });
 }
 
