@@ -24,6 +24,11 @@ GtkWidget* makeLabel(const char* styleClass)
     gtk_label_set_wrap(GTK_LABEL(label), TRUE);
     gtk_label_set_wrap_mode(GTK_LABEL(label), PANGO_WRAP_WORD_CHAR);
     gtk_label_set_justify(GTK_LABEL(label), GTK_JUSTIFY_CENTER);
+    // A name that is broken must not look as if it had hyphens.
+    auto* attributes = pango_attr_list_new();
+    pango_attr_list_insert(attributes, pango_attr_insert_hyphens_new(FALSE));
+    gtk_label_set_attributes(GTK_LABEL(label), attributes);
+    pango_attr_list_unref(attributes);
     gtk_label_set_max_width_chars(GTK_LABEL(label), 36);
     gtk_widget_add_css_class(label, styleClass);
     return label;

@@ -89,6 +89,8 @@ Attributes attributes(const Theme& theme, const Font& font, const platform::Colo
 {
     Attributes list(pango_attr_list_new(), &pango_attr_list_unref);
     insert(list.get(), pango_attr_font_desc_new(theme.describe(font).get()), 0, G_MAXUINT);
+    // A name that is broken must not look as if it had hyphens.
+    insert(list.get(), pango_attr_insert_hyphens_new(FALSE), 0, G_MAXUINT);
     if (color && !(*color == platform::Color::black()))
         insertColor(list.get(), theme.resolve(*color, ColorUse::Content), 0, G_MAXUINT);
     return list;
