@@ -3,6 +3,7 @@
 #include "host/gtk/BarItemPeer.h"
 #include "host/gtk/ScrolledBody.h"
 #include "host/gtk/TextFieldPeer.h"
+#include "platform/ui/HostedView.h"
 #include "platform/ui/TextField.h"
 
 #include <algorithm>
@@ -56,6 +57,19 @@ void setText(GtkWidget* label, const std::string& text)
 {
     gtk_label_set_label(GTK_LABEL(label), text.c_str());
     gtk_widget_set_visible(label, !text.empty());
+}
+
+/// Gives the focus to the first widget that takes it.
+bool focusWithin(GtkWidget* widget)
+{
+    if (gtk_widget_get_focusable(widget) && gtk_widget_grab_focus(widget))
+        return true;
+    for (auto* child = gtk_widget_get_first_child(widget); child;
+         child = gtk_widget_get_next_sibling(child)) {
+        if (focusWithin(child))
+            return true;
+    }
+    return false;
 }
 
 } // namespace
@@ -226,6 +240,11 @@ void AlertContent::focus()
         _peers.front()->grabFocus();
         return;
     }
+    // What is written in an alert is what it is there for.
+    const auto content = alert->contentViewController();
+    const bool isHosted = content && std::dynamic_pointer_cast<ui::HostedView>(content->view());
+    if (isHosted && !_peers.empty() && focusWithin(_peers.front()->widget()))
+        return;
     const auto preferred = alert->preferredAction() ? alert->preferredAction() : alert->escapeAction();
     for (std::size_t i = 0; i < _buttons.size(); ++i) {
         if (!preferred || alert->actions()[i] == preferred) {

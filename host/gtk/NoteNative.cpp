@@ -54,7 +54,6 @@ GtkWidget* makeText(const std::shared_ptr<NoteView>& note)
         if (const auto edited = weak.lock())
             edited->userEdited(textOf(buffer));
     }));
-    connections.push_back(connectSignal<void()>(text, "map", [text] { gtk_widget_grab_focus(text); }));
     keep(text, std::move(connections));
     return text;
 }
@@ -71,6 +70,8 @@ void addNoteMaker(PeerContext& context)
             const auto note = std::static_pointer_cast<NoteView>(hosted.shared_from_this());
             auto* window = gtk_scrolled_window_new();
             gtk_widget_add_css_class(window, "note");
+            // The focus is the text's, never its frame's.
+            gtk_widget_set_focusable(window, FALSE);
             gtk_scrolled_window_set_policy(
                 GTK_SCROLLED_WINDOW(window), GTK_POLICY_NEVER, GTK_POLICY_AUTOMATIC);
             gtk_scrolled_window_set_child(GTK_SCROLLED_WINDOW(window), makeText(note));

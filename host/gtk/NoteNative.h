@@ -4,7 +4,7 @@
 
 namespace host::gtk {
 
-/// Makes a context know notes: texts of several lines that take the focus when they are shown.
+/// Makes a context know notes: texts of several lines.
 void addNoteMaker(PeerContext& context);
 
 } // namespace host::gtk

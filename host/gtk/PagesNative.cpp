@@ -54,6 +54,7 @@ void PagesNative::start()
     addSelection();
     addTap();
     addKeys();
+    addUndo();
     _connections.push_back(
         connectSignal<void()>(widget(), "map", [this] { gtk_widget_grab_focus(_scroller.canvas()); }));
     const auto view = _view.lock();
@@ -124,6 +125,26 @@ void PagesNative::addTap()
         }));
 }
 
+/// Ctrl+Z, wherever the focus is: but a text that is being written takes back its own letters.
+void PagesNative::addUndo()
+{
+    auto* controller = gtk_shortcut_controller_new();
+    gtk_shortcut_controller_set_scope(GTK_SHORTCUT_CONTROLLER(controller), GTK_SHORTCUT_SCOPE_GLOBAL);
+    const auto call = [](GtkWidget* shown, GVariant*, gpointer data) -> gboolean {
+        auto* focus = gtk_root_get_focus(gtk_widget_get_root(shown));
+        const auto view = static_cast<std::weak_ptr<View>*>(data)->lock();
+        if (!view || !gtk_widget_get_mapped(shown) || GTK_IS_TEXT(focus) || GTK_IS_TEXT_VIEW(focus))
+            return FALSE;
+        view->userWantsUndo();
+        return TRUE;
+    };
+    auto* action = gtk_callback_action_new(call, std::make_unique<std::weak_ptr<View>>(_view).release(),
+        [](gpointer data) { delete static_cast<std::weak_ptr<View>*>(data); });
+    gtk_shortcut_controller_add_shortcut(GTK_SHORTCUT_CONTROLLER(controller),
+        gtk_shortcut_new(gtk_shortcut_trigger_parse_string("<Control>z"), action));
+    gtk_widget_add_controller(widget(), controller);
+}
+
 void PagesNative::addKeys()
 {
     auto* keys = gtk_event_controller_key_new();
@@ -141,8 +162,6 @@ bool PagesNative::pressed(guint key, bool withControl)
         return false;
     if (withControl && key == GDK_KEY_c)
         previewShouldCopy();
-    else if (withControl && key == GDK_KEY_z)
-        view->userWantsUndo();
     else if (view->isPlacing() && (key == GDK_KEY_Return || key == GDK_KEY_KP_Enter))
         view->userPressesEnter();
     else

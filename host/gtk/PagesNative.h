@@ -45,6 +45,7 @@ private:
     void addSelection();
     void addTap();
     void addKeys();
+    void addUndo();
     bool pressed(guint key, bool withControl);
     void updateLabel();
 

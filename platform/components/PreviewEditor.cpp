@@ -83,6 +83,7 @@ void PreviewEditor::connect()
             editor->use(tool);
     });
     _fieldBar->setOnPress(calling(&PreviewEditor::pressField));
+    _fieldBar->setOnLeave(calling(&PreviewEditor::finishWriting));
     _fieldBar->setOnNext([weak] {
         if (const auto editor = weak.lock())
             editor->use(EditTool::NextField);

@@ -112,6 +112,12 @@ bool PreviewFieldBar::textFieldShouldReturn(ui::TextField&)
     return true;
 }
 
+void PreviewFieldBar::textFieldDidEndEditing(ui::TextField&)
+{
+    if (const auto call = _onLeave)
+        call();
+}
+
 void PreviewFieldBar::layoutSubviews()
 {
     const double width = std::max(0.0, bounds().width - 2 * margin);

@@ -28,6 +28,8 @@ public:
 
     /// Called when the person has written a text and goes on to the next field.
     void setOnNext(std::function<void()> callback) { _onNext = std::move(callback); }
+    /// Called when the person leaves the field in which a text is written.
+    void setOnLeave(std::function<void()> callback) { _onLeave = std::move(callback); }
     /// Called when the button is pressed that switches a box, or asks for a choice.
     void setOnPress(std::function<void()> callback) { _onPress = std::move(callback); }
 
@@ -45,12 +47,13 @@ public:
 private:
     void build();
     bool textFieldShouldReturn(ui::TextField& field) override;
+    void textFieldDidEndEditing(ui::TextField& field) override;
 
     std::optional<FormField> _field;
     std::shared_ptr<ui::Label> _name;
     std::shared_ptr<ui::TextField> _text;
     std::shared_ptr<ui::Button> _button;
-    std::function<void()> _onNext, _onPress;
+    std::function<void()> _onNext, _onLeave, _onPress;
 };
 
 /// What a choice, a box or a button holds, in words.
