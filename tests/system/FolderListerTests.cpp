@@ -199,6 +199,45 @@ TEST_F(LargeFolderTest, FolderThatTurnsUnreadableMidwayFailsWithWhatWasRead)
     EXPECT_LT(updates[0]->count(), 9000U);
 }
 
+TEST_F(LargeFolderTest, IsReadWholeWhereLooksAtItsNamesWouldCostMore)
+{
+    const auto readWhole = [this] { return !updates.back()->revision(); };
+    directory.write("large/name 0", "");
+    const auto listing = list(directory.at("large"));
+    dispatch->runUntilIdle();
+    fill(6000); // more names at once than are worth a look each
+    while (updates.back()->count() < 6000)
+        waitForUpdate();
+    EXPECT_TRUE(readWhole());
+    expectNaturalOrder(updates.back());
+    directory.write("large/.hidden", "");
+    directory.write("large/name 6000", "");
+    waitForUpdate();
+    EXPECT_FALSE(readWhole());
+    EXPECT_EQ(updates.back()->revision()->inserted, std::vector<std::uint32_t>{6000});
+    expectNaturalOrder(updates.back());
+
+    // The names of what has gone are kept until they are most of what is kept.
+    const auto longName = [](int i) { return "x/" + std::string(240, 'n') + std::to_string(i); };
+    directory.write("x/a", "");
+    const auto other = list(directory.at("x"));
+    dispatch->runUntilIdle();
+    const auto before = updates.size();
+    for (int i = 0; i < 400; ++i) {
+        const auto path = directory.write(longName(i), "");
+        waitForUpdate();
+        std::filesystem::remove(path);
+        waitForUpdate();
+    }
+    while (updates.back()->count() != 1)
+        waitForUpdate();
+    EXPECT_EQ(names(updates.back()), std::vector<std::string>{"a"});
+    const auto wholeLists = std::count_if(updates.begin() + static_cast<std::ptrdiff_t>(before),
+        updates.end(), [](const Snapshot& update) { return !update->revision(); });
+    EXPECT_GE(wholeLists, 1);
+    EXPECT_LE(wholeLists, 3);
+}
+
 TEST_F(LargeFolderTest, RealThreadsGiveTheSameList)
 {
     fill(20'000);
