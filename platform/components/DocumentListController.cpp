@@ -184,8 +184,10 @@ void DocumentListController::viewDidAppear(bool animated)
     _hasTakenKeyboard = false;
     takeKeyboard();
     // The folders in it may hold something else since they were looked at.
-    _rows->invalidateDetails(std::vector<ui::RowId>());
-    _rows->visibleRowsDidChange();
+    if (_rows) {
+        _rows->invalidateDetails(std::vector<ui::RowId>());
+        _rows->visibleRowsDidChange();
+    }
     // The delegate takes the list off the stack, which must not happen while the stack is still moving.
     if (_wasRemoved)
         services().dispatch().mainQueue()->async([weak = std::weak_ptr(self())] {
