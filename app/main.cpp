@@ -57,14 +57,17 @@ std::string localeFolder(const std::filesystem::path& executable)
                                                    : executable.parent_path().parent_path() / "share/locale";
 }
 
+/// Named after the version: the module of another one uses other classes than this program has.
+constexpr auto moduleName = "previews-" TRW_VERSION ".so";
+
 /// The module of the previews, in the build tree, else where it is installed.
 std::string previewModule(const std::filesystem::path& executable)
 {
-    const auto built = executable.parent_path() / "modules" / "previews.so";
+    const auto built = executable.parent_path() / "modules" / moduleName;
     std::error_code problem;
     return std::filesystem::exists(built, problem)
         ? built
-        : executable.parent_path().parent_path() / TRW_MODULE_FOLDER / "previews.so";
+        : executable.parent_path().parent_path() / TRW_MODULE_FOLDER / moduleName;
 }
 
 /// What needs nothing of the drive.
