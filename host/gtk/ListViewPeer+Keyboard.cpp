@@ -83,10 +83,26 @@ bool ListViewPeer::keyPressed(guint key, GdkModifierType modifiers)
     const auto keepsSelf = shared_from_this();
     if (endsTyping(key))
         _typeAhead.clear();
+    if ((modifiers & commandModifiers) == 0 && (key == GDK_KEY_Tab || key == GDK_KEY_ISO_Left_Tab))
+        return leaveByTab(key == GDK_KEY_Tab ? GTK_DIR_TAB_FORWARD : GTK_DIR_TAB_BACKWARD);
     const auto* row = focusedRow();
     if (row && rowKeyPressed(ListRowWidget::position(const_cast<GtkWidget*>(row)), key, modifiers))
         return true;
     return listKeyPressed(key, modifiers) || typedAhead(key, modifiers);
+}
+
+/// The toolkit goes along the rows by Tab as well, of which there may be a hundred thousand.
+bool ListViewPeer::leaveByTab(GtkDirectionType direction)
+{
+    auto* root = gtk_widget_get_root(_listWidget);
+    gtk_widget_set_can_focus(_listWidget, FALSE);
+    bool hasLeft = gtk_widget_child_focus(GTK_WIDGET(root), direction);
+    if (!hasLeft) {
+        gtk_root_set_focus(root, nullptr);
+        hasLeft = gtk_widget_child_focus(GTK_WIDGET(root), direction);
+    }
+    gtk_widget_set_can_focus(_listWidget, TRUE);
+    return hasLeft;
 }
 
 bool ListViewPeer::rowKeyPressed(std::size_t row, guint key, GdkModifierType modifiers)

@@ -72,6 +72,7 @@ private:
 
     // The keyboard.
     bool keyPressed(guint key, GdkModifierType modifiers);
+    bool leaveByTab(GtkDirectionType direction);
     bool rowKeyPressed(std::size_t row, guint key, GdkModifierType modifiers);
     bool listKeyPressed(guint key, GdkModifierType modifiers);
     bool extendByKey(std::size_t from, guint key);

@@ -6,7 +6,7 @@ namespace e2e {
 namespace {
 
 constexpr unsigned returnKey = 0xff0d, escape = 0xff1b, deleteKey = 0xffff, f2 = 0xffbf, menuKey = 0xff67,
-                   down = 0xff54, up = 0xff52, space = ' ';
+                   down = 0xff54, up = 0xff52, space = ' ', tab = 0xff09;
 
 /// All by the keyboard, as somebody without a pointer does it.
 class KeyboardTests : public DriveTests {
@@ -58,6 +58,11 @@ TEST_F(KeyboardTests, LeadsThroughTheFolders)
     pressKey(returnKey);
     expectKeyboardAt("Household");
     type("read");
+    expectKeyboardAt("Reading notes");
+    // Tab leaves the list, however many rows it has, and comes back to the row.
+    pressKey(tab);
+    expectKeyboardAt("Back");
+    pressKey(tab, Modifier::Shift);
     expectKeyboardAt("Reading notes");
     pressKey(returnKey);
     EXPECT_TRUE(eventually([this] { return program->document().find("Dispossessed") != std::string::npos; }));
