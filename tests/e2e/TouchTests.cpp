@@ -156,6 +156,7 @@ TEST_F(TouchTests, FingersFillInAFormAndMarkATextThatIsSavedOnLeaving)
 TEST_F(TouchTests, AFingerAlongTheMarksSelectsARange)
 {
     tap("Documents");
+    placeOf("Household");
     tap("Select");
     expectShown("Cancel");
     const double mark = 25;
