@@ -41,7 +41,9 @@ std::shared_ptr<const Prepared> find(const std::string& fileName)
 {
     static std::mutex mutex;
     static const auto names = ObjectRef<GtkSourceLanguageManager>::adopt(gtk_source_language_manager_new());
-    static Languages known;
+    // Never taken apart: at the end of the program the library has taken its own work back already, and a
+    // buffer that ends then complains.
+    static auto& known = *std::make_unique<Languages>().release();
     const std::lock_guard lock(mutex);
     auto* found = gtk_source_language_manager_guess_language(names.get(), fileName.c_str(), nullptr);
     if (!found)
