@@ -16,11 +16,9 @@ namespace {
 
 /// The toolkit keeps about this many rows as widgets, whatever the screen shows; more rows cost nothing.
 constexpr std::size_t livingRows = 220;
-/// How many of them are made in one frame, and how many are filled, so that a frame stays a frame. The first
-/// frame has a page to lay out as well.
+/// How many of them are made in one frame, so that a frame stays a frame. The first frame has a page to lay
+/// out as well.
 constexpr std::size_t firstRows = 6, moreRows = 6;
-/// Rows beside the seen ones that are filled with them: a layout that is a little late shows no empty row.
-constexpr std::size_t seenMargin = 2;
 /// The widgets take so many single changes at once; more are told in one away from what is seen.
 constexpr std::size_t mostSplices = 16;
 constexpr double textMargin =
@@ -64,12 +62,6 @@ bool showsAnew(const ui::ListChanges& changes, std::size_t row)
     const auto after = std::ranges::upper_bound(
         changes.changed, row, {}, [](const ui::RowRange& range) { return range.first; });
     return after != changes.changed.begin() && std::prev(after)->contains(row);
-}
-
-bool isSeen(const ui::ListView& list, std::size_t row)
-{
-    const auto visible = list.visibleRows();
-    return row + seenMargin >= visible.first && row < visible.end() + seenMargin;
 }
 
 /// Few enough splices that leave the rows with widgets alone, or at least those that are seen: a row that
@@ -220,86 +212,6 @@ void ListViewPeer::setUpRow(GtkListItem* item)
     connectForLife<void(int, double, double)>(click, "pressed",
         [menu = answer(&ListViewPeer::showMenuOf), click](int, double x, double y) { menu(click, x, y); });
     gtk_list_item_set_child(item, row);
-}
-
-void ListViewPeer::bindRow(GtkListItem* item)
-{
-    const auto list = _list.lock();
-    const guint position = gtk_list_item_get_position(item);
-    _unfilled.erase(item);
-    if (list && position < list->rowCount())
-        ListRowWidget::show(gtk_list_item_get_child(item), list->row(position), list->rowHeight());
-}
-
-void ListViewPeer::fillSoon(GtkListItem* item)
-{
-    const auto list = _list.lock();
-    // Between two splices of one change a place is not that of the row.
-    if (list && !_isSplicing && isSeen(*list, gtk_list_item_get_position(item))) {
-        bindRow(item);
-        context().firstList().note(_listWidget);
-        return;
-    }
-    if (list)
-        ListRowWidget::reserve(gtk_list_item_get_child(item), list->rowHeight());
-    _unfilled.insert(item);
-    fillLater();
-}
-
-void ListViewPeer::fillAllSoon()
-{
-    _unfilled = _live;
-    fillLater();
-}
-
-void ListViewPeer::fillLater()
-{
-    context().scheduler().schedule(&_fillKey, [this] { fillRows(); });
-}
-
-void ListViewPeer::fillRows()
-{
-    fillSeenRows();
-    auto others = unfilledBesideSeen();
-    const bool areMore = others.size() > moreRows;
-    others.resize(std::min(others.size(), moreRows));
-    for (auto* item : others)
-        bindRow(item);
-    if (areMore)
-        context().scheduler().scheduleNextFrame(&_fillKey, [this] { fillRows(); });
-    if (!_live.empty())
-        context().firstList().note(_listWidget);
-}
-
-void ListViewPeer::fillSeenRows()
-{
-    const auto list = _list.lock();
-    const auto waiting = _unfilled;
-    for (auto* item : waiting) {
-        if (list && isSeen(*list, gtk_list_item_get_position(item)))
-            bindRow(item);
-    }
-}
-
-/// The nearest first.
-std::vector<GtkListItem*> ListViewPeer::unfilledBesideSeen() const
-{
-    std::vector<GtkListItem*> items(_unfilled.begin(), _unfilled.end());
-    const auto list = _list.lock();
-    const auto seen = list ? list->visibleRows().first : 0;
-    std::ranges::sort(items, {}, [seen](GtkListItem* item) {
-        const std::size_t position = gtk_list_item_get_position(item);
-        return position < seen ? seen - position : position - seen;
-    });
-    return items;
-}
-
-std::vector<GtkWidget*> ListViewPeer::liveRows() const
-{
-    std::vector<GtkWidget*> rows;
-    for (auto* item : _live)
-        rows.push_back(gtk_list_item_get_child(item));
-    return rows;
 }
 
 void ListViewPeer::activated(guint position)
