@@ -3,13 +3,15 @@
 // page one.
 
 #include "host/drive/LocalCloudDocumentService.h"
+#include "host/previews/PopplerDocuments.h"
 #include "host/system/GLibDispatch.h"
 #include "host/system/GdkPixbufImageLoader.h"
+#include "host/system/GettextLocalization.h"
 #include "host/system/IcuFormatters.h"
 #include "host/system/LocalFileCoordinator.h"
 #include "host/system/MimeTypeRegistry.h"
-#include "host/previews/PopplerDocuments.h"
 #include "host/system/PosixFileSystem.h"
+#include "host/system/UserLocale.h"
 #include "platform/NotificationCenter.h"
 #include "platform/PagedDocument.h"
 #include "platform/Services.h"
@@ -87,6 +89,8 @@ public:
         set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>();
         set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
         set.formatters = std::make_shared<host::system::IcuFormatters>("en_US");
+        set.localization = std::make_shared<host::system::GettextLocalization>(
+            std::string(), host::system::UserLocale::fromEnvironment());
         set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
         set.pagedDocumentOpener = std::make_shared<host::previews::PopplerDocuments>();
         set.typeRegistry = std::make_shared<host::system::MimeTypeRegistry>();

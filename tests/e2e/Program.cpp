@@ -7,6 +7,7 @@
 #include <deque>
 #include <fcntl.h>
 #include <fstream>
+#include <iterator>
 #include <regex>
 #include <signal.h>
 #include <spawn.h>
@@ -105,7 +106,10 @@ void Program::expectOrderlyEnd()
     kill(_process, SIGTERM);
     int status = 0;
     EXPECT_TRUE(Accessible::waitFor([&] { return waitpid(_process, &status, WNOHANG) == _process; }));
-    EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0) << status;
+    std::ifstream errors(_errors);
+    EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0)
+        << status << '\n'
+        << std::string(std::istreambuf_iterator<char>(errors), {});
 }
 
 std::vector<Accessible> Program::buttons(const std::string& beginning) const
