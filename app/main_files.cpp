@@ -172,8 +172,7 @@ int main(int argc, char** argv)
                                 : 2;
     if (status == 2)
         std::fputs("usage: tarrow-files list [PATH] | mkdir|remove|evict|fetch|docid PATH | move FROM TO | "
-                   "save PATH FROM | "
-                   "resolve ID\n",
+                   "save PATH FROM | resolve ID\n",
             stderr);
     platform::installServices({});
     return status;
