@@ -5,13 +5,13 @@
 #include "items/DocumentIdentifiers.h"
 #include "items/Settings.h"
 #include "items/UrlResolution.h"
+#include "kit/Screen.h"
+#include "kit/Window.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/UserDefaults.h"
-#include "platform/ui/Screen.h"
-#include "platform/ui/Window.h"
 #include "preview/PreviewMode.h"
 
 namespace tarrow {

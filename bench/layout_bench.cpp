@@ -1,5 +1,5 @@
-#include "platform/ui/Label.h"
-#include "platform/ui/LayoutConstraint.h"
+#include "kit/Label.h"
+#include "kit/LayoutConstraint.h"
 
 #include <benchmark/benchmark.h>
 

@@ -4,14 +4,14 @@
 #include "browser/NavController.h"
 #include "drawing/FileTags.h"
 #include "items/MenuEnableChecks.h"
+#include "kit/Button.h"
+#include "kit/NavigationItem.h"
+#include "kit/View.h"
 #include "platform/Formatters.h"
 #include "platform/Localization.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/components/DocumentListController.h"
-#include "platform/ui/Button.h"
-#include "platform/ui/NavigationItem.h"
-#include "platform/ui/View.h"
 
 namespace tarrow {
 

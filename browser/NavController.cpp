@@ -2,6 +2,7 @@
 
 #include "browser/ListLogging.h"
 #include "items/DRItem.h"
+#include "kit/View.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
 #include "platform/Formatters.h"
@@ -14,7 +15,6 @@
 #include "platform/components/DocumentListController.h"
 #include "platform/components/UnavailableScreen.h"
 #include "platform/components/UpgradeFlow.h"
-#include "platform/ui/View.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
 

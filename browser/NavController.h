@@ -1,11 +1,11 @@
 #pragma once
 
+#include "kit/NavigationController.h"
 #include "platform/Date.h"
 #include "platform/NotificationCenter.h"
 #include "platform/components/DocumentInteractionSheet.h"
 #include "platform/components/DocumentListControllerDelegate.h"
 #include "platform/components/MoveTargetPicker.h"
-#include "platform/ui/NavigationController.h"
 #include "prompts/DocumentListControllerStatusBar.h"
 #include "prompts/QuotaFetcher.h"
 

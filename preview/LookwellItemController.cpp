@@ -1,11 +1,11 @@
 #include "preview/LookwellItemController.h"
 
 #include "items/DRItem.h"
+#include "kit/View.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"
 #include "platform/components/DocumentInteractionSheet.h"
-#include "platform/ui/View.h"
 #include "preview/PreviewItemManager.h"
 #include "preview/TarrowDriveAppPreview.h"
 

@@ -1,8 +1,8 @@
 #pragma once
 
+#include "kit/Menu.h"
 #include "platform/Url.h"
 #include "platform/components/PreviewController.h"
-#include "platform/ui/Menu.h"
 
 #include <memory>
 #include <optional>

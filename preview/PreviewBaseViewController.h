@@ -1,9 +1,9 @@
 #pragma once
 
+#include "kit/BarButtonItem.h"
+#include "kit/LayoutConstraint.h"
+#include "kit/ViewController.h"
 #include "platform/Geometry.h"
-#include "platform/ui/BarButtonItem.h"
-#include "platform/ui/LayoutConstraint.h"
-#include "platform/ui/ViewController.h"
 #include "preview/PreviewMode.h"
 
 #include <memory>

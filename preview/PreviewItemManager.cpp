@@ -4,12 +4,12 @@
 #include "preview/PreviewItemManager.h"
 
 #include "items/DRItem.h"
+#include "kit/SearchPresentation.h"
 #include "platform/Dispatch.h"
 #include "platform/FileSystem.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/components/DocumentInteractionSheet.h"
-#include "platform/ui/SearchPresentation.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewDetailsViewController.h"
 

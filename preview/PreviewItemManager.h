@@ -1,13 +1,13 @@
 #pragma once
 
+#include "kit/NavigationController.h"
+#include "kit/ViewController.h"
 #include "platform/Date.h"
 #include "platform/FilePresenter.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Url.h"
 #include "platform/components/DocumentListController.h"
 #include "platform/components/MoveTargetPicker.h"
-#include "platform/ui/NavigationController.h"
-#include "platform/ui/ViewController.h"
 #include "preview/PreviewMode.h"
 
 #include <memory>

@@ -1,10 +1,10 @@
 #include "prompts/DocumentListControllerStatusBar.h"
 
+#include "kit/Label.h"
+#include "kit/Screen.h"
 #include "platform/Log.h"
 #include "platform/components/DocumentListController.h"
 #include "platform/components/StorageUpgradeButton.h"
-#include "platform/ui/Label.h"
-#include "platform/ui/Screen.h"
 #include "prompts/DriveStatusLabelView.h"
 
 namespace tarrow {

@@ -1,7 +1,7 @@
 #pragma once
 
+#include "kit/BarButtonItem.h"
 #include "platform/StorageOffers.h"
-#include "platform/ui/BarButtonItem.h"
 
 #include <memory>
 #include <string>

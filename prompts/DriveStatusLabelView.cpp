@@ -1,7 +1,7 @@
 #include "prompts/DriveStatusLabelView.h"
 
+#include "kit/Label.h"
 #include "platform/components/StorageUpgradeButton.h"
-#include "platform/ui/Label.h"
 
 #include <algorithm>
 

@@ -1,10 +1,10 @@
 #include "prompts/FilenamePrompt.h"
 
 #include "items/FileUtils.h"
+#include "kit/AlertController.h"
+#include "kit/LayoutConstraint.h"
+#include "kit/TextField.h"
 #include "platform/Localization.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/LayoutConstraint.h"
-#include "platform/ui/TextField.h"
 #include "prompts/SimpleTextViewController.h"
 #include "prompts/UIUtils.h"
 

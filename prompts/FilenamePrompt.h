@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/ui/TextFieldDelegate.h"
+#include "kit/TextFieldDelegate.h"
 
 #include <functional>
 #include <memory>

@@ -1,8 +1,8 @@
 #include "prompts/SimpleTextViewController.h"
 
-#include "platform/ui/Label.h"
-#include "platform/ui/LayoutConstraint.h"
-#include "platform/ui/StandardColors.h"
+#include "kit/Label.h"
+#include "kit/LayoutConstraint.h"
+#include "kit/StandardColors.h"
 
 namespace tarrow {
 

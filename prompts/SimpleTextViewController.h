@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/ui/Font.h"
-#include "platform/ui/ViewController.h"
+#include "kit/Font.h"
+#include "kit/ViewController.h"
 
 namespace platform::ui {
 class Label;

@@ -1,8 +1,8 @@
 #include "items/DRItem.h"
+#include "kit/AlertController.h"
+#include "kit/BarButtonItem.h"
+#include "kit/View.h"
 #include "platform/Localization.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/BarButtonItem.h"
-#include "platform/ui/View.h"
 #include "prompts/UIUtils.h"
 
 namespace tarrow {

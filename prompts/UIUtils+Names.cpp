@@ -1,6 +1,6 @@
 #include "items/FileUtils.h"
 #include "items/UrlResolution.h"
-#include "platform/ui/TextField.h"
+#include "kit/TextField.h"
 #include "prompts/UIUtils.h"
 
 #include <algorithm>

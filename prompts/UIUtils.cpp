@@ -1,9 +1,9 @@
 #include "prompts/UIUtils.h"
 
+#include "kit/AlertController.h"
+#include "kit/Screen.h"
+#include "kit/View.h"
 #include "platform/Localization.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/Screen.h"
-#include "platform/ui/View.h"
 
 namespace tarrow {
 

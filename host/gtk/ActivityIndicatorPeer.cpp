@@ -1,6 +1,6 @@
 #include "host/gtk/ActivityIndicatorPeer.h"
 
-#include "platform/ui/ActivityIndicator.h"
+#include "kit/ActivityIndicator.h"
 
 namespace host::gtk {
 

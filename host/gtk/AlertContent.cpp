@@ -3,8 +3,8 @@
 #include "host/gtk/BarItemPeer.h"
 #include "host/gtk/ScrolledBody.h"
 #include "host/gtk/TextFieldPeer.h"
-#include "platform/ui/HostedView.h"
-#include "platform/ui/TextField.h"
+#include "kit/HostedView.h"
+#include "kit/TextField.h"
 
 #include <algorithm>
 

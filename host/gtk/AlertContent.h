@@ -3,7 +3,7 @@
 #include "host/gtk/LayerContent.h"
 #include "host/gtk/ObjectRef.h"
 #include "host/gtk/PeerContext.h"
-#include "platform/ui/AlertController.h"
+#include "kit/AlertController.h"
 
 #include <memory>
 #include <vector>

@@ -2,7 +2,7 @@
 
 #include "host/gtk/PeerContext.h"
 #include "host/gtk/Signal.h"
-#include "platform/ui/BarButtonItem.h"
+#include "kit/BarButtonItem.h"
 
 #include <memory>
 

@@ -2,7 +2,7 @@
 
 #include "host/gtk/ImagePaint.h"
 #include "host/gtk/LabelPeer.h"
-#include "platform/ui/Button.h"
+#include "kit/Button.h"
 
 #include <algorithm>
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/gtk/Theme.h"
-#include "platform/ui/Canvas.h"
+#include "kit/Canvas.h"
 
 #include <cairo.h>
 

@@ -1,7 +1,7 @@
 #include "host/gtk/GestureFeed.h"
 
-#include "platform/ui/GestureRecognizer.h"
-#include "platform/ui/View.h"
+#include "kit/GestureRecognizer.h"
+#include "kit/View.h"
 
 #include <chrono>
 

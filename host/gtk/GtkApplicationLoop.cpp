@@ -3,13 +3,13 @@
 #include "host/gtk/BroadwayServer.h"
 #include "host/gtk/HandOverToasts.h"
 #include "host/gtk/RemoteInstance.h"
+#include "kit/AlertController.h"
+#include "kit/InterfaceState.h"
+#include "kit/ViewController.h"
 #include "platform/Localization.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Services.h"
 #include "platform/UserDefaults.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/InterfaceState.h"
-#include "platform/ui/ViewController.h"
 
 #include <glib-unix.h>
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/gtk/WindowPeer.h"
-#include "platform/ui/WindowHost.h"
+#include "kit/WindowHost.h"
 
 #include <functional>
 #include <memory>

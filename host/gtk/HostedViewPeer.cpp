@@ -1,6 +1,6 @@
 #include "host/gtk/HostedViewPeer.h"
 
-#include "platform/ui/HostedView.h"
+#include "kit/HostedView.h"
 
 namespace host::gtk {
 

@@ -1,7 +1,7 @@
 #include "host/gtk/ImageViewPeer.h"
 
 #include "host/gtk/ImagePaint.h"
-#include "platform/ui/ImageView.h"
+#include "kit/ImageView.h"
 
 #include <algorithm>
 

@@ -1,7 +1,7 @@
 #include "host/gtk/LabelPeer.h"
 
 #include "host/gtk/TextLayout.h"
-#include "platform/ui/Label.h"
+#include "kit/Label.h"
 
 namespace host::gtk {
 

@@ -6,8 +6,8 @@
 #include "host/gtk/ScreenPeer.h"
 #include "host/gtk/SearchContent.h"
 #include "host/gtk/ViewPeer.h"
-#include "platform/ui/NavigationController.h"
-#include "platform/ui/ViewControllerVisitor.h"
+#include "kit/NavigationController.h"
+#include "kit/ViewControllerVisitor.h"
 
 #include <cmath>
 #include <optional>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/ui/ListRow.h"
+#include "kit/ListRow.h"
 
 #include <functional>
 

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "host/gtk/ViewPeer.h"
-#include "platform/ui/ListView.h"
-#include "platform/ui/TypeAhead.h"
+#include "kit/ListView.h"
+#include "kit/TypeAhead.h"
 
 #include <optional>
 #include <unordered_set>

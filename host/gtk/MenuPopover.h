@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/ui/Menu.h"
+#include "kit/Menu.h"
 
 #include <gtk/gtk.h>
 

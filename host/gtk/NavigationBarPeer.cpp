@@ -2,8 +2,8 @@
 
 #include "host/gtk/ButtonPeer.h"
 #include "host/gtk/MenuPopover.h"
+#include "kit/NavigationItem.h"
 #include "platform/Localization.h"
-#include "platform/ui/NavigationItem.h"
 
 #include <adwaita.h>
 

@@ -2,7 +2,7 @@
 
 #include "host/gtk/BarItemPeer.h"
 
-#include "platform/ui/Menu.h"
+#include "kit/Menu.h"
 
 #include <functional>
 #include <vector>

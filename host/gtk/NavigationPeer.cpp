@@ -1,7 +1,7 @@
 #include "host/gtk/NavigationPeer.h"
 
 #include "host/gtk/ViewPeer.h"
-#include "platform/ui/NavigationController.h"
+#include "kit/NavigationController.h"
 
 #include <algorithm>
 

@@ -2,8 +2,8 @@
 
 #include "host/gtk/ScreenPage.h"
 #include "host/gtk/SizedBin.h"
-#include "platform/ui/NavigationObserver.h"
-#include "platform/ui/ViewObserver.h"
+#include "kit/NavigationObserver.h"
+#include "kit/ViewObserver.h"
 
 #include <adwaita.h>
 

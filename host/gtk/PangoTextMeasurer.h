@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/gtk/Theme.h"
-#include "platform/ui/TextMeasurer.h"
+#include "kit/TextMeasurer.h"
 
 #include <memory>
 

@@ -7,13 +7,13 @@
 #include "host/gtk/ScrollViewPeer.h"
 #include "host/gtk/TextFieldPeer.h"
 #include "host/gtk/ViewPeer.h"
-#include "platform/ui/ActivityIndicator.h"
-#include "platform/ui/Button.h"
-#include "platform/ui/HostedView.h"
-#include "platform/ui/ImageView.h"
-#include "platform/ui/ListView.h"
-#include "platform/ui/TextField.h"
-#include "platform/ui/ViewVisitor.h"
+#include "kit/ActivityIndicator.h"
+#include "kit/Button.h"
+#include "kit/HostedView.h"
+#include "kit/ImageView.h"
+#include "kit/ListView.h"
+#include "kit/TextField.h"
+#include "kit/ViewVisitor.h"
 
 namespace host::gtk {
 

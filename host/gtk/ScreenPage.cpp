@@ -1,9 +1,9 @@
 #include "host/gtk/ScreenPage.h"
 
 #include "host/gtk/ViewPeer.h"
-#include "platform/ui/NavigationController.h"
-#include "platform/ui/NavigationItem.h"
-#include "platform/ui/TraitCollection.h"
+#include "kit/NavigationController.h"
+#include "kit/NavigationItem.h"
+#include "kit/TraitCollection.h"
 
 namespace host::gtk {
 

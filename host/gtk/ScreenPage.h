@@ -3,7 +3,7 @@
 #include "host/gtk/NavigationBarPeer.h"
 #include "host/gtk/ScreenPeer.h"
 #include "host/gtk/ToolbarPeer.h"
-#include "platform/ui/ViewControllerObserver.h"
+#include "kit/ViewControllerObserver.h"
 
 #include <memory>
 

@@ -2,10 +2,10 @@
 
 #include "host/gtk/NavigationPeer.h"
 #include "host/gtk/ViewPeer.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/NavigationController.h"
-#include "platform/ui/SearchPresentation.h"
-#include "platform/ui/ViewControllerVisitor.h"
+#include "kit/AlertController.h"
+#include "kit/NavigationController.h"
+#include "kit/SearchPresentation.h"
+#include "kit/ViewControllerVisitor.h"
 
 namespace host::gtk {
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/gtk/ViewPeer.h"
-#include "platform/ui/ScrollView.h"
+#include "kit/ScrollView.h"
 
 namespace host::gtk {
 

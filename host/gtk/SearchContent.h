@@ -3,7 +3,7 @@
 #include "host/gtk/LayerContent.h"
 #include "host/gtk/PeerContext.h"
 #include "host/gtk/ScreenPeer.h"
-#include "platform/ui/SearchPresentation.h"
+#include "kit/SearchPresentation.h"
 
 #include <memory>
 

@@ -1,7 +1,7 @@
 #include "host/gtk/TextFieldPeer.h"
 
 #include "host/gtk/TextLayout.h"
-#include "platform/ui/TextField.h"
+#include "kit/TextField.h"
 
 #include <algorithm>
 

@@ -2,8 +2,8 @@
 
 #include "host/gtk/ObjectRef.h"
 #include "host/gtk/Theme.h"
-#include "platform/ui/AttributedText.h"
-#include "platform/ui/TextMeasurer.h"
+#include "kit/AttributedText.h"
+#include "kit/TextMeasurer.h"
 
 #include <pango/pangocairo.h>
 

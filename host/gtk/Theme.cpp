@@ -1,6 +1,6 @@
 #include "host/gtk/Theme.h"
 
-#include "platform/ui/StandardColors.h"
+#include "kit/StandardColors.h"
 
 #include <adwaita.h>
 

@@ -2,8 +2,8 @@
 
 #include "host/gtk/ObjectRef.h"
 #include "host/gtk/Signal.h"
+#include "kit/Font.h"
 #include "platform/Color.h"
-#include "platform/ui/Font.h"
 
 #include <gtk/gtk.h>
 

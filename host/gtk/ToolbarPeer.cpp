@@ -1,6 +1,6 @@
 #include "host/gtk/ToolbarPeer.h"
 
-#include "platform/ui/View.h"
+#include "kit/View.h"
 
 #include <algorithm>
 

@@ -3,7 +3,7 @@
 #include "host/gtk/CanvasWidget.h"
 #include "host/gtk/ObjectRef.h"
 #include "host/gtk/PeerContext.h"
-#include "platform/ui/View.h"
+#include "kit/View.h"
 
 #include <functional>
 #include <memory>

@@ -3,8 +3,8 @@
 #include "host/gtk/LayerFactory.h"
 #include "host/gtk/NoteNative.h"
 #include "host/gtk/PreviewNative.h"
+#include "kit/ViewController.h"
 #include "platform/Localization.h"
-#include "platform/ui/ViewController.h"
 
 #include <algorithm>
 

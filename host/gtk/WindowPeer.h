@@ -5,7 +5,7 @@
 #include "host/gtk/PresentedLayer.h"
 #include "host/gtk/ScreenPeer.h"
 #include "host/gtk/SizedBin.h"
-#include "platform/ui/Window.h"
+#include "kit/Window.h"
 
 #include <adwaita.h>
 

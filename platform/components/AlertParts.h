@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/ui/AlertController.h"
+#include "kit/AlertController.h"
 
 #include <functional>
 #include <memory>

@@ -1,12 +1,12 @@
 #include "platform/components/DocumentInteractionSheet.h"
 
+#include "kit/AlertController.h"
 #include "platform/DocumentSharing.h"
 #include "platform/FileSystem.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/components/ErrorWords.h"
 #include "platform/components/FolderPlaces.h"
-#include "platform/ui/AlertController.h"
 
 #include <algorithm>
 #include <utility>

@@ -1,10 +1,10 @@
 #pragma once
 
+#include "kit/PopoverAnchor.h"
 #include "platform/AppRegistry.h"
 #include "platform/Error.h"
 #include "platform/Geometry.h"
 #include "platform/Url.h"
-#include "platform/ui/PopoverAnchor.h"
 
 #include <functional>
 #include <memory>

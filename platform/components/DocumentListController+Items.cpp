@@ -1,5 +1,8 @@
 #include "platform/components/DocumentListController.h"
 
+#include "kit/AlertAction.h"
+#include "kit/AlertController.h"
+#include "kit/ListView.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
@@ -7,9 +10,6 @@
 #include "platform/components/DocumentRowSource.h"
 #include "platform/components/ErrorWords.h"
 #include "platform/components/FolderContents.h"
-#include "platform/ui/AlertAction.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/ListView.h"
 
 #include <algorithm>
 #include <utility>

@@ -1,5 +1,8 @@
 #include "platform/components/DocumentListController.h"
 
+#include "kit/ListView.h"
+#include "kit/NavigationController.h"
+#include "kit/NavigationItem.h"
 #include "platform/Dispatch.h"
 #include "platform/FolderLister.h"
 #include "platform/Localization.h"
@@ -10,9 +13,6 @@
 #include "platform/components/FolderContents.h"
 #include "platform/components/FolderPlaces.h"
 #include "platform/components/PlaceholderView.h"
-#include "platform/ui/ListView.h"
-#include "platform/ui/NavigationController.h"
-#include "platform/ui/NavigationItem.h"
 
 #include <chrono>
 #include <utility>

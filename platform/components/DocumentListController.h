@@ -1,13 +1,13 @@
 #pragma once
 
+#include "kit/ListViewDelegate.h"
+#include "kit/ViewController.h"
 #include "platform/Error.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
 #include "platform/components/DocumentListAction.h"
 #include "platform/components/DocumentListControllerDelegate.h"
 #include "platform/components/ListOrder.h"
-#include "platform/ui/ListViewDelegate.h"
-#include "platform/ui/ViewController.h"
 
 #include <functional>
 #include <map>

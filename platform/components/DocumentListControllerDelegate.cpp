@@ -1,6 +1,6 @@
 #include "platform/components/DocumentListControllerDelegate.h"
 
-#include "platform/ui/StandardColors.h"
+#include "kit/StandardColors.h"
 
 namespace platform::components {
 

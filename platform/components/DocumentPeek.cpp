@@ -1,9 +1,9 @@
 #include "platform/components/DocumentPeek.h"
 
+#include "kit/AlertController.h"
+#include "kit/TapRecognizer.h"
+#include "kit/View.h"
 #include "platform/Localization.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/TapRecognizer.h"
-#include "platform/ui/View.h"
 
 #include <utility>
 

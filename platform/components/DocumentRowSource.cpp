@@ -1,5 +1,6 @@
 #include "platform/components/DocumentRowSource.h"
 
+#include "kit/ListView.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
@@ -7,7 +8,6 @@
 #include "platform/components/DetailText.h"
 #include "platform/components/DisplayName.h"
 #include "platform/components/RowThumbnail.h"
-#include "platform/ui/ListView.h"
 
 #include <utility>
 

@@ -1,11 +1,11 @@
 #pragma once
 
+#include "kit/ListViewDataSource.h"
 #include "platform/Color.h"
 #include "platform/NotificationCenter.h"
 #include "platform/components/DocumentRows.h"
 #include "platform/components/RowDetails.h"
 #include "platform/components/VisibleRowLoader.h"
-#include "platform/ui/ListViewDataSource.h"
 
 #include <functional>
 #include <memory>

@@ -1,9 +1,9 @@
 #pragma once
 
+#include "kit/ListChanges.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
 #include "platform/components/SnapshotOrder.h"
-#include "platform/ui/ListChanges.h"
 
 #include <cstdint>
 #include <memory>

@@ -1,11 +1,11 @@
 #include "platform/components/DocumentSearch.h"
 
+#include "kit/ListView.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/components/DocumentRowSource.h"
 #include "platform/components/FolderPlaces.h"
 #include "platform/components/PlaceholderView.h"
-#include "platform/ui/ListView.h"
 
 #include <algorithm>
 #include <utility>

@@ -1,10 +1,10 @@
 #pragma once
 
+#include "kit/ListViewDelegate.h"
+#include "kit/SearchPresentation.h"
 #include "platform/NameSearch.h"
 #include "platform/Url.h"
 #include "platform/components/DocumentRows.h"
-#include "platform/ui/ListViewDelegate.h"
-#include "platform/ui/SearchPresentation.h"
 
 #include <functional>
 #include <memory>

@@ -1,8 +1,8 @@
 #include "platform/components/FolderNameAlert.h"
 
+#include "kit/AlertController.h"
+#include "kit/TextField.h"
 #include "platform/Localization.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/TextField.h"
 
 #include <utility>
 

@@ -1,7 +1,7 @@
 #pragma once
 
+#include "kit/NavigationController.h"
 #include "platform/Url.h"
-#include "platform/ui/NavigationController.h"
 
 #include <memory>
 #include <vector>

@@ -1,7 +1,7 @@
 #pragma once
 
+#include "kit/ListViewDataSource.h"
 #include "platform/FolderSnapshot.h"
-#include "platform/ui/ListViewDataSource.h"
 
 #include <functional>
 #include <memory>

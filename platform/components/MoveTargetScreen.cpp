@@ -1,5 +1,8 @@
 #include "platform/components/MoveTargetScreen.h"
 
+#include "kit/AlertController.h"
+#include "kit/ListView.h"
+#include "kit/NavigationItem.h"
 #include "platform/FileCoordinator.h"
 #include "platform/FileSystem.h"
 #include "platform/Localization.h"
@@ -10,9 +13,6 @@
 #include "platform/components/MoveTargetPicker.h"
 #include "platform/components/PlaceholderView.h"
 #include "platform/components/RecentMoveTargets.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/ListView.h"
-#include "platform/ui/NavigationItem.h"
 
 #include <algorithm>
 #include <utility>

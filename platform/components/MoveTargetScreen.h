@@ -1,10 +1,10 @@
 #pragma once
 
+#include "kit/ListViewDelegate.h"
+#include "kit/ViewController.h"
 #include "platform/Dispatch.h"
 #include "platform/FolderLister.h"
 #include "platform/components/MoveTargetRows.h"
-#include "platform/ui/ListViewDelegate.h"
-#include "platform/ui/ViewController.h"
 
 #include <memory>
 #include <optional>

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/ui/HostedView.h"
-#include "platform/ui/ViewController.h"
+#include "kit/HostedView.h"
+#include "kit/ViewController.h"
 
 #include <memory>
 #include <string>

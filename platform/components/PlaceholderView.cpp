@@ -1,10 +1,10 @@
 #include "platform/components/PlaceholderView.h"
 
-#include "platform/ui/ActivityIndicator.h"
-#include "platform/ui/ImageView.h"
-#include "platform/ui/Label.h"
-#include "platform/ui/StackView.h"
-#include "platform/ui/StandardColors.h"
+#include "kit/ActivityIndicator.h"
+#include "kit/ImageView.h"
+#include "kit/Label.h"
+#include "kit/StackView.h"
+#include "kit/StandardColors.h"
 
 #include <initializer_list>
 

@@ -1,5 +1,6 @@
 // Changing the document that is shown, and what becomes of the edits.
 
+#include "kit/NavigationController.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/components/AlertParts.h"
@@ -13,7 +14,6 @@
 #include "platform/components/PreviewPagesView.h"
 #include "platform/components/PreviewScreenView.h"
 #include "platform/components/PreviewToolbar.h"
-#include "platform/ui/NavigationController.h"
 
 #include <algorithm>
 #include <cerrno>

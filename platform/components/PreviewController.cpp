@@ -1,5 +1,9 @@
 #include "platform/components/PreviewController.h"
 
+#include "kit/Button.h"
+#include "kit/NavigationController.h"
+#include "kit/NavigationItem.h"
+#include "kit/TextField.h"
 #include "platform/Dispatch.h"
 #include "platform/FileSystem.h"
 #include "platform/ItemDownload.h"
@@ -14,10 +18,6 @@
 #include "platform/components/PreviewSummaryView.h"
 #include "platform/components/PreviewToolbar.h"
 #include "platform/components/PreviewViews.h"
-#include "platform/ui/Button.h"
-#include "platform/ui/NavigationController.h"
-#include "platform/ui/NavigationItem.h"
-#include "platform/ui/TextField.h"
 
 #include <algorithm>
 #include <chrono>

@@ -1,12 +1,12 @@
 #pragma once
 
+#include "kit/BarButtonItem.h"
+#include "kit/ViewController.h"
 #include "platform/Error.h"
 #include "platform/FileSystem.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Url.h"
 #include "platform/components/PreviewControllerProtocols.h"
-#include "platform/ui/BarButtonItem.h"
-#include "platform/ui/ViewController.h"
 
 #include <atomic>
 #include <functional>

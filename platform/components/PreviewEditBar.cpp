@@ -1,7 +1,7 @@
 #include "platform/components/PreviewEditBar.h"
 
+#include "kit/Button.h"
 #include "platform/Localization.h"
-#include "platform/ui/Button.h"
 
 #include <algorithm>
 #include <utility>

@@ -1,11 +1,11 @@
 #include "platform/components/PreviewEditor.h"
 
+#include "kit/Button.h"
+#include "kit/TextField.h"
 #include "platform/Localization.h"
 #include "platform/components/AlertParts.h"
 #include "platform/components/NoteView.h"
 #include "platform/components/PreviewFieldBar.h"
-#include "platform/ui/Button.h"
-#include "platform/ui/TextField.h"
 
 #include <algorithm>
 #include <utility>

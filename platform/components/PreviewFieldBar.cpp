@@ -1,8 +1,8 @@
 #include "platform/components/PreviewFieldBar.h"
 
+#include "kit/Button.h"
+#include "kit/TextField.h"
 #include "platform/Localization.h"
-#include "platform/ui/Button.h"
-#include "platform/ui/TextField.h"
 
 #include <algorithm>
 #include <utility>

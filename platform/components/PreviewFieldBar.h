@@ -1,8 +1,8 @@
 #pragma once
 
+#include "kit/TextFieldDelegate.h"
+#include "kit/View.h"
 #include "platform/PagedDocumentEditing.h"
-#include "platform/ui/TextFieldDelegate.h"
-#include "platform/ui/View.h"
 
 #include <functional>
 #include <memory>

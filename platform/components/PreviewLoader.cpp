@@ -1,5 +1,6 @@
 #include "platform/components/PreviewLoader.h"
 
+#include "kit/Screen.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/FileCoordinator.h"
 #include "platform/FileSystem.h"
@@ -11,7 +12,6 @@
 #include "platform/components/DisplayName.h"
 #include "platform/components/ErrorWords.h"
 #include "platform/components/TextDecoding.h"
-#include "platform/ui/Screen.h"
 
 #include <filesystem>
 #include <fstream>

@@ -1,10 +1,10 @@
 #include "platform/components/PreviewScreenView.h"
 
+#include "kit/Label.h"
+#include "kit/StandardColors.h"
 #include "platform/components/PreviewFieldBar.h"
 #include "platform/components/PreviewSearchBar.h"
 #include "platform/components/PreviewToolbar.h"
-#include "platform/ui/Label.h"
-#include "platform/ui/StandardColors.h"
 
 #include <algorithm>
 

@@ -1,12 +1,12 @@
 #include "platform/components/PreviewSearchBar.h"
 
+#include "kit/Button.h"
+#include "kit/Label.h"
+#include "kit/TextField.h"
 #include "platform/Dispatch.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/components/PreviewView.h"
-#include "platform/ui/Button.h"
-#include "platform/ui/Label.h"
-#include "platform/ui/TextField.h"
 
 #include <algorithm>
 #include <chrono>

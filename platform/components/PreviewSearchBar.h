@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/ui/TextFieldDelegate.h"
-#include "platform/ui/View.h"
+#include "kit/TextFieldDelegate.h"
+#include "kit/View.h"
 
 #include <functional>
 #include <memory>

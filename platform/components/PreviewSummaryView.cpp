@@ -1,11 +1,11 @@
 #include "platform/components/PreviewSummaryView.h"
 
-#include "platform/ui/ActivityIndicator.h"
-#include "platform/ui/Button.h"
-#include "platform/ui/ImageView.h"
-#include "platform/ui/Label.h"
-#include "platform/ui/StackView.h"
-#include "platform/ui/StandardColors.h"
+#include "kit/ActivityIndicator.h"
+#include "kit/Button.h"
+#include "kit/ImageView.h"
+#include "kit/Label.h"
+#include "kit/StackView.h"
+#include "kit/StandardColors.h"
 
 #include <algorithm>
 #include <initializer_list>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/ui/View.h"
+#include "kit/View.h"
 
 #include <functional>
 #include <memory>

@@ -1,9 +1,9 @@
 #include "platform/components/PreviewToolbar.h"
 
+#include "kit/Button.h"
+#include "kit/Label.h"
 #include "platform/Localization.h"
 #include "platform/components/PreviewPagesView.h"
-#include "platform/ui/Button.h"
-#include "platform/ui/Label.h"
 
 namespace platform::components {
 

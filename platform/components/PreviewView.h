@@ -1,8 +1,8 @@
 #pragma once
 
+#include "kit/HostedView.h"
+#include "kit/ObserverSlot.h"
 #include "platform/Geometry.h"
-#include "platform/ui/HostedView.h"
-#include "platform/ui/ObserverSlot.h"
 
 #include <cstddef>
 #include <functional>

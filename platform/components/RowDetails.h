@@ -1,9 +1,9 @@
 #pragma once
 
+#include "kit/ListRow.h"
 #include "platform/Date.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
-#include "platform/ui/ListRow.h"
 
 #include <optional>
 #include <string>

@@ -1,7 +1,7 @@
 #pragma once
 
+#include "kit/Button.h"
 #include "platform/StorageOffers.h"
-#include "platform/ui/Button.h"
 
 #include <memory>
 

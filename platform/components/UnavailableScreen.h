@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/ui/ViewController.h"
+#include "kit/ViewController.h"
 
 #include <memory>
 

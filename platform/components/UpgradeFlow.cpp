@@ -1,10 +1,10 @@
 #include "platform/components/UpgradeFlow.h"
 
+#include "kit/AlertController.h"
 #include "platform/LinkOpener.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/components/ErrorWords.h"
-#include "platform/ui/AlertController.h"
 
 #include <utility>
 

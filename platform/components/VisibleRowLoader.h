@@ -1,10 +1,10 @@
 #pragma once
 
+#include "kit/ListRow.h"
 #include "platform/Dispatch.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Services.h"
 #include "platform/Url.h"
-#include "platform/ui/ListRow.h"
 
 #include <cstdint>
 #include <functional>

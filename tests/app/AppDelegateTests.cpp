@@ -4,9 +4,9 @@
 #include "host/drive/DocumentIndex.h"
 #include "host/drive/ItemFacts.h"
 #include "items/Settings.h"
+#include "kit/SearchPresentation.h"
+#include "kit/Window.h"
 #include "platform/components/DocumentListController.h"
-#include "platform/ui/SearchPresentation.h"
-#include "platform/ui/Window.h"
 #include "preview/PreviewItemManager.h"
 #include "tests/browser/support/BrowserFixture.h"
 

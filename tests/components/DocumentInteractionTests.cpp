@@ -1,9 +1,9 @@
 #include "tests/components/support/ComponentsFixture.h"
 
+#include "kit/AlertController.h"
+#include "kit/View.h"
 #include "platform/Localization.h"
 #include "platform/components/DocumentInteractionSheet.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/View.h"
 
 #include <gmock/gmock.h>
 

@@ -2,10 +2,10 @@
 
 #include "tests/components/support/DocumentListFixture.h"
 
+#include "kit/AlertController.h"
+#include "kit/NavigationItem.h"
+#include "kit/SearchPresentation.h"
 #include "platform/components/FolderPlaces.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/NavigationItem.h"
-#include "platform/ui/SearchPresentation.h"
 
 #include <map>
 

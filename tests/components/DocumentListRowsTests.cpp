@@ -3,9 +3,9 @@
 #include "tests/components/support/DocumentListFixture.h"
 
 #include "host/drive/ItemFacts.h"
+#include "kit/AlertController.h"
 #include "platform/Localization.h"
 #include "platform/components/RowThumbnail.h"
-#include "platform/ui/AlertController.h"
 
 #include <filesystem>
 #include <fstream>

@@ -2,9 +2,9 @@
 
 #include "tests/components/support/DocumentListFixture.h"
 
+#include "kit/NavigationItem.h"
 #include "platform/components/PlaceholderView.h"
 #include "platform/components/UnavailableScreen.h"
-#include "platform/ui/NavigationItem.h"
 
 #include <cerrno>
 #include <filesystem>

@@ -1,13 +1,13 @@
 #include "tests/components/support/ComponentsFixture.h"
 
 #include "host/drive/ContainerRecord.h"
+#include "kit/AlertController.h"
+#include "kit/ListView.h"
+#include "kit/NavigationItem.h"
+#include "kit/TextField.h"
 #include "platform/components/MoveTargetPicker.h"
 #include "platform/components/MoveTargetScreen.h"
 #include "platform/components/PlaceholderView.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/ListView.h"
-#include "platform/ui/NavigationItem.h"
-#include "platform/ui/TextField.h"
 
 #include <gmock/gmock.h>
 

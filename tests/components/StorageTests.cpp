@@ -1,7 +1,7 @@
+#include "kit/AlertController.h"
+#include "kit/Window.h"
 #include "platform/components/StorageUpgradeButton.h"
 #include "platform/components/UpgradeFlow.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/Window.h"
 #include "tests/components/support/ComponentsFixture.h"
 
 #include <gmock/gmock.h>

@@ -1,10 +1,10 @@
 #include "WindowFixture.h"
+#include "kit/Button.h"
+#include "kit/Label.h"
+#include "kit/StackView.h"
+#include "kit/TextField.h"
+#include "kit/ViewController.h"
 #include "platform/Color.h"
-#include "platform/ui/Button.h"
-#include "platform/ui/Label.h"
-#include "platform/ui/StackView.h"
-#include "platform/ui/TextField.h"
-#include "platform/ui/ViewController.h"
 
 #include <gmock/gmock.h>
 

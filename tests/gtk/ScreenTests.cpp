@@ -1,10 +1,10 @@
 #include "WindowFixture.h"
 #include "host/gtk/ListRowWidget.h"
 #include "host/gtk/ListViewPeer.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/ListView.h"
-#include "platform/ui/NavigationItem.h"
-#include "platform/ui/TextField.h"
+#include "kit/AlertController.h"
+#include "kit/ListView.h"
+#include "kit/NavigationItem.h"
+#include "kit/TextField.h"
 
 #include <gmock/gmock.h>
 

@@ -2,10 +2,10 @@
 
 #include "GtkEnvironment.h"
 #include "host/previews/MakePreviewLibraries.h"
+#include "kit/NavigationItem.h"
+#include "kit/ViewController.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Services.h"
-#include "platform/ui/NavigationItem.h"
-#include "platform/ui/ViewController.h"
 #include "tests/support/PlainTexts.h"
 
 namespace testing_support {

@@ -4,8 +4,8 @@
 #include "host/gtk/NavigationPeer.h"
 #include "host/gtk/PreviewModule.h"
 #include "host/gtk/ViewPeer.h"
-#include "platform/ui/NavigationController.h"
-#include "platform/ui/Window.h"
+#include "kit/NavigationController.h"
+#include "kit/Window.h"
 
 #include <gtest/gtest.h>
 

@@ -1,13 +1,13 @@
 #include "preview/PreviewBaseViewController.h"
 
 #include "PreviewFixture.h"
+#include "kit/AlertController.h"
+#include "kit/Button.h"
+#include "kit/NavigationItem.h"
+#include "kit/Screen.h"
+#include "kit/ScrollView.h"
 #include "platform/components/DocumentInteractionSheet.h"
 #include "platform/components/PlaceholderView.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/Button.h"
-#include "platform/ui/NavigationItem.h"
-#include "platform/ui/Screen.h"
-#include "platform/ui/ScrollView.h"
 
 #include <gmock/gmock.h>
 

@@ -1,4 +1,7 @@
 #include "PreviewFixture.h"
+#include "kit/AlertController.h"
+#include "kit/Button.h"
+#include "kit/TextField.h"
 #include "platform/FileSystem.h"
 #include "platform/PagedDocumentEditing.h"
 #include "platform/components/NoteView.h"
@@ -8,9 +11,6 @@
 #include "platform/components/PreviewPagesView.h"
 #include "platform/components/PreviewScreenView.h"
 #include "platform/components/PreviewToolbar.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/Button.h"
-#include "platform/ui/TextField.h"
 #include "tests/support/FormPdf.h"
 #include "tests/support/SimplePdf.h"
 

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "items/DRItem.h"
-#include "platform/ui/NavigationController.h"
-#include "platform/ui/Window.h"
+#include "kit/NavigationController.h"
+#include "kit/Window.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewDetailsViewController.h"
 #include "preview/PreviewItemManager.h"

@@ -2,8 +2,8 @@
 
 #include "PreviewFixture.h"
 #include "items/DRItem.h"
+#include "kit/SearchPresentation.h"
 #include "platform/components/PreviewContent.h"
-#include "platform/ui/SearchPresentation.h"
 #include "preview/LookwellItemController.h"
 
 #include <gmock/gmock.h>

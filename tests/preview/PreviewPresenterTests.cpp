@@ -1,9 +1,9 @@
 #include "PreviewFixture.h"
 #include "items/FileUtils.h"
+#include "kit/AlertController.h"
 #include "platform/ActivityHandOver.h"
 #include "platform/components/PlaceholderView.h"
 #include "platform/components/PreviewContent.h"
-#include "platform/ui/AlertController.h"
 
 #include <fcntl.h>
 #include <gmock/gmock.h>

@@ -1,8 +1,8 @@
+#include "kit/AlertController.h"
+#include "kit/BarButtonItem.h"
+#include "kit/View.h"
+#include "kit/Window.h"
 #include "platform/components/DocumentListController.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/BarButtonItem.h"
-#include "platform/ui/View.h"
-#include "platform/ui/Window.h"
 #include "prompts/UIUtils.h"
 #include "tests/support/DriveFixture.h"
 

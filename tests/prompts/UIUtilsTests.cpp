@@ -1,8 +1,8 @@
+#include "kit/AlertController.h"
+#include "kit/Screen.h"
+#include "kit/View.h"
+#include "kit/Window.h"
 #include "platform/Services.h"
-#include "platform/ui/AlertController.h"
-#include "platform/ui/Screen.h"
-#include "platform/ui/View.h"
-#include "platform/ui/Window.h"
 #include "prompts/UIUtils.h"
 #include "tests/support/PlainTexts.h"
 

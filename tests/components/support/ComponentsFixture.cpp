@@ -2,7 +2,7 @@
 
 #include "host/system/MimeTypeRegistry.h"
 #include "host/system/ThreadedFolderLister.h"
-#include "platform/ui/ListView.h"
+#include "kit/ListView.h"
 
 #include <chrono>
 #include <utility>

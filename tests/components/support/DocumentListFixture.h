@@ -1,8 +1,8 @@
 #pragma once
 
 #include "host/drive/ContainerRecord.h"
-#include "platform/ui/ListView.h"
-#include "platform/ui/ListViewObserver.h"
+#include "kit/ListView.h"
+#include "kit/ListViewObserver.h"
 #include "tests/components/support/ComponentsFixture.h"
 
 #include <gmock/gmock.h>

@@ -1,0 +1,33 @@
+#include "kit/ActivityIndicator.h"
+
+#include "kit/ViewVisitor.h"
+
+namespace platform::ui {
+
+void ActivityIndicator::accept(ViewVisitor& visitor)
+{
+    visitor.visit(*this);
+}
+
+void ActivityIndicator::startAnimating()
+{
+    if (_animating)
+        return;
+    _animating = true;
+    changed(ViewChange::Content);
+}
+
+void ActivityIndicator::stopAnimating()
+{
+    if (!_animating)
+        return;
+    _animating = false;
+    changed(ViewChange::Content);
+}
+
+Size ActivityIndicator::intrinsicContentSize(double) const
+{
+    return {sideLength, sideLength};
+}
+
+} // namespace platform::ui

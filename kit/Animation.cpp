@@ -1,0 +1,33 @@
+#include "kit/Animation.h"
+
+#include <utility>
+
+namespace platform::ui {
+
+namespace {
+
+const AnimationOptions*& runningAnimation()
+{
+    static const AnimationOptions* options = nullptr;
+    return options;
+}
+
+} // namespace
+
+void animate(const AnimationOptions& options, const std::function<void()>& changes,
+    const std::function<void()>& completion)
+{
+    const auto* outer = std::exchange(runningAnimation(), &options);
+    if (changes)
+        changes();
+    runningAnimation() = outer;
+    if (completion)
+        completion();
+}
+
+const AnimationOptions* currentAnimation()
+{
+    return runningAnimation();
+}
+
+} // namespace platform::ui

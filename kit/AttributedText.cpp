@@ -1,0 +1,29 @@
+#include "kit/AttributedText.h"
+
+namespace platform::ui {
+
+AttributedText::AttributedText(std::string text, TextAttributes attributes)
+{
+    append(std::move(text), attributes);
+}
+
+void AttributedText::append(std::string text, TextAttributes attributes)
+{
+    if (!text.empty())
+        _runs.push_back({std::move(text), std::nullopt, attributes});
+}
+
+void AttributedText::append(Image attachment, TextAttributes attributes)
+{
+    _runs.push_back({{}, std::move(attachment), attributes});
+}
+
+std::string AttributedText::plainText() const
+{
+    std::string text;
+    for (const auto& run : _runs)
+        text += run.text;
+    return text;
+}
+
+} // namespace platform::ui

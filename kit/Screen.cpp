@@ -1,0 +1,30 @@
+#include "kit/Screen.h"
+
+namespace platform::ui {
+
+namespace {
+
+std::optional<Screen>& mainScreen()
+{
+    static std::optional<Screen> screen;
+    return screen;
+}
+
+} // namespace
+
+const std::optional<Screen>& Screen::main()
+{
+    return mainScreen();
+}
+
+void Screen::setMain(std::optional<Screen> screen)
+{
+    mainScreen() = screen;
+}
+
+double Screen::mainScale()
+{
+    return mainScreen() ? mainScreen()->scale : 1;
+}
+
+} // namespace platform::ui
