@@ -11,7 +11,7 @@
 #include "host/system/PosixFileSystem.h"
 #include "host/system/ThreadedFolderLister.h"
 #include "platform/Services.h"
-#include "platform/components/FolderContents.h"
+#include "screens/list/FolderContents.h"
 
 #include <benchmark/benchmark.h>
 #include <glib.h>

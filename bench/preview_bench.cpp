@@ -15,8 +15,8 @@
 #include "platform/NotificationCenter.h"
 #include "platform/PagedDocument.h"
 #include "platform/Services.h"
-#include "platform/components/PreviewLoader.h"
-#include "platform/components/PreviewPagesView.h"
+#include "screens/preview/PreviewLoader.h"
+#include "screens/preview/PreviewPagesView.h"
 
 #include <cairo.h>
 #include <gdk-pixbuf/gdk-pixbuf.h>

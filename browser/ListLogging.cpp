@@ -2,7 +2,7 @@
 
 #include "items/FileUtils.h"
 #include "platform/Log.h"
-#include "platform/components/DocumentListController.h"
+#include "screens/list/DocumentListController.h"
 
 namespace tarrow {
 

@@ -11,7 +11,7 @@
 #include "platform/Localization.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
-#include "platform/components/DocumentListController.h"
+#include "screens/list/DocumentListController.h"
 
 namespace tarrow {
 

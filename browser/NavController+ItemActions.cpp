@@ -10,11 +10,11 @@
 #include "kit/View.h"
 #include "platform/Localization.h"
 #include "platform/Log.h"
-#include "platform/components/DocumentListController.h"
 #include "preview/PreviewMode.h"
 #include "prompts/NewFolderPrompt.h"
 #include "prompts/RenamePrompt.h"
 #include "prompts/UIUtils.h"
+#include "screens/list/DocumentListController.h"
 
 namespace tarrow {
 

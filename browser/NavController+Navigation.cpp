@@ -11,10 +11,10 @@
 #include "platform/Localization.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
-#include "platform/components/DocumentListController.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
+#include "screens/list/DocumentListController.h"
 
 #include <array>
 

@@ -12,11 +12,11 @@
 #include "platform/StateCoder.h"
 #include "platform/StorageOffers.h"
 #include "platform/UserDefaults.h"
-#include "platform/components/DocumentListController.h"
-#include "platform/components/UnavailableScreen.h"
-#include "platform/components/UpgradeFlow.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
+#include "screens/UnavailableScreen.h"
+#include "screens/UpgradeFlow.h"
+#include "screens/list/DocumentListController.h"
 
 namespace tarrow {
 

@@ -3,11 +3,11 @@
 #include "kit/NavigationController.h"
 #include "platform/Date.h"
 #include "platform/NotificationCenter.h"
-#include "platform/components/DocumentInteractionSheet.h"
-#include "platform/components/DocumentListControllerDelegate.h"
-#include "platform/components/MoveTargetPicker.h"
 #include "prompts/DocumentListControllerStatusBar.h"
 #include "prompts/QuotaFetcher.h"
+#include "screens/DocumentInteractionSheet.h"
+#include "screens/list/DocumentListControllerDelegate.h"
+#include "screens/move/MoveTargetPicker.h"
 
 #include <cstdint>
 #include <memory>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/components/DocumentListController.h"
+#include "screens/list/DocumentListController.h"
 
 namespace tarrow {
 

@@ -2,8 +2,8 @@
 
 #include "items/FileUtils.h"
 #include "items/UrlResolution.h"
-#include "platform/components/DocumentInteractionSheet.h"
-#include "platform/components/DocumentListController.h"
+#include "screens/DocumentInteractionSheet.h"
+#include "screens/list/DocumentListController.h"
 
 #include <algorithm>
 

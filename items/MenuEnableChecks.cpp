@@ -4,7 +4,7 @@
 #include "items/FileUtils.h"
 #include "items/UrlResolution.h"
 #include "platform/FileSystem.h"
-#include "platform/components/DocumentListController.h"
+#include "screens/list/DocumentListController.h"
 
 #include <algorithm>
 #include <array>

@@ -5,9 +5,9 @@
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"
-#include "platform/components/DocumentInteractionSheet.h"
 #include "preview/PreviewItemManager.h"
 #include "preview/TarrowDriveAppPreview.h"
+#include "screens/DocumentInteractionSheet.h"
 
 namespace tarrow {
 

@@ -2,7 +2,7 @@
 
 #include "kit/Menu.h"
 #include "platform/Url.h"
-#include "platform/components/PreviewController.h"
+#include "screens/preview/PreviewController.h"
 
 #include <memory>
 #include <optional>

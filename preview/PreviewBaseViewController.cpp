@@ -11,9 +11,9 @@
 #include "kit/VisualFormat.h"
 #include "kit/Window.h"
 #include "platform/Log.h"
-#include "platform/components/DocumentInteractionSheet.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
+#include "screens/DocumentInteractionSheet.h"
 
 #include <algorithm>
 

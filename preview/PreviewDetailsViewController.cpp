@@ -3,8 +3,8 @@
 #include "items/DRItem.h"
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"
-#include "platform/components/PlaceholderView.h"
 #include "preview/PreviewItemManager.h"
+#include "screens/PlaceholderView.h"
 
 namespace tarrow {
 

@@ -9,9 +9,9 @@
 #include "platform/FileSystem.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
-#include "platform/components/DocumentInteractionSheet.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewDetailsViewController.h"
+#include "screens/DocumentInteractionSheet.h"
 
 #include <thread>
 #include <utility>

@@ -6,9 +6,9 @@
 #include "platform/FilePresenter.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Url.h"
-#include "platform/components/DocumentListController.h"
-#include "platform/components/MoveTargetPicker.h"
 #include "preview/PreviewMode.h"
+#include "screens/list/DocumentListController.h"
+#include "screens/move/MoveTargetPicker.h"
 
 #include <memory>
 #include <mutex>

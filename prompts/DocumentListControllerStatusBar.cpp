@@ -3,9 +3,9 @@
 #include "kit/Label.h"
 #include "kit/Screen.h"
 #include "platform/Log.h"
-#include "platform/components/DocumentListController.h"
-#include "platform/components/StorageUpgradeButton.h"
 #include "prompts/DriveStatusLabelView.h"
+#include "screens/StorageUpgradeButton.h"
+#include "screens/list/DocumentListController.h"
 
 namespace tarrow {
 

@@ -1,7 +1,7 @@
 #include "prompts/DriveStatusLabelView.h"
 
 #include "kit/Label.h"
-#include "platform/components/StorageUpgradeButton.h"
+#include "screens/StorageUpgradeButton.h"
 
 #include <algorithm>
 

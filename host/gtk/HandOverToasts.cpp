@@ -4,7 +4,7 @@
 #include "platform/Dispatch.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
-#include "platform/components/DisplayName.h"
+#include "screens/DisplayName.h"
 
 #include <algorithm>
 #include <utility>

@@ -1,7 +1,7 @@
 #include "host/gtk/NoteNative.h"
 
 #include "host/gtk/Signal.h"
-#include "platform/components/NoteView.h"
+#include "screens/preview/NoteView.h"
 
 #include <gtk/gtk.h>
 

@@ -2,7 +2,7 @@
 
 #include "host/gtk/PreviewNative.h"
 #include "host/gtk/ZoomScroller.h"
-#include "platform/components/PreviewPagesView.h"
+#include "screens/preview/PreviewPagesView.h"
 
 #include <map>
 

@@ -2,7 +2,7 @@
 
 #include "host/gtk/PreviewNative.h"
 #include "host/gtk/ZoomScroller.h"
-#include "platform/components/PreviewPictureView.h"
+#include "screens/preview/PreviewPictureView.h"
 
 #include <vector>
 

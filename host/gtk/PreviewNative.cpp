@@ -3,8 +3,8 @@
 #include "host/gtk/PagesNative.h"
 #include "host/gtk/PictureNative.h"
 #include "host/gtk/PreviewModule.h"
-#include "platform/components/PreviewMediaView.h"
-#include "platform/components/PreviewTextView.h"
+#include "screens/preview/PreviewMediaView.h"
+#include "screens/preview/PreviewTextView.h"
 
 #include <adwaita.h>
 

@@ -2,7 +2,7 @@
 
 #include "host/gtk/ObjectRef.h"
 #include "host/gtk/PeerContext.h"
-#include "platform/components/PreviewView.h"
+#include "screens/preview/PreviewView.h"
 
 #include <gtk/gtk.h>
 

@@ -3,7 +3,7 @@
 #include "host/gtk/ObjectRef.h"
 #include "host/gtk/PreviewModule.h"
 #include "host/system/Translate.h"
-#include "platform/components/TextDecoding.h"
+#include "screens/preview/TextDecoding.h"
 
 #include <gdk-pixbuf/gdk-pixbuf.h>
 #include <glib/gstdio.h>

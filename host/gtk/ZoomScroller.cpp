@@ -1,6 +1,6 @@
 #include "host/gtk/ZoomScroller.h"
 
-#include "platform/components/PreviewView.h"
+#include "screens/preview/PreviewView.h"
 
 #include <algorithm>
 #include <cmath>

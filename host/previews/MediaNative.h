@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/gtk/PreviewNative.h"
-#include "platform/components/PreviewMediaView.h"
+#include "screens/preview/PreviewMediaView.h"
 
 namespace host::previews {
 

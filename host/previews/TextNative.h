@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/gtk/PreviewNative.h"
-#include "platform/components/PreviewTextView.h"
+#include "screens/preview/PreviewTextView.h"
 
 #include <gtksourceview/gtksource.h>
 

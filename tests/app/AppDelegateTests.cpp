@@ -6,8 +6,8 @@
 #include "items/Settings.h"
 #include "kit/SearchPresentation.h"
 #include "kit/Window.h"
-#include "platform/components/DocumentListController.h"
 #include "preview/PreviewItemManager.h"
+#include "screens/list/DocumentListController.h"
 #include "tests/browser/support/BrowserFixture.h"
 
 #include <gmock/gmock.h>

@@ -1,8 +1,8 @@
 #include "browser/NavController.h"
 #include "platform/UserDefaults.h"
-#include "platform/components/DocumentListController.h"
-#include "platform/components/UnavailableScreen.h"
 #include "preview/PreviewItemManager.h"
+#include "screens/UnavailableScreen.h"
+#include "screens/list/DocumentListController.h"
 #include "tests/browser/support/BrowserFixture.h"
 
 #include <gmock/gmock.h>

@@ -4,11 +4,11 @@
 #include "kit/Label.h"
 #include "kit/TextField.h"
 #include "kit/View.h"
-#include "platform/components/DocumentListAction.h"
-#include "platform/components/DocumentListController.h"
-#include "platform/components/MoveTargetPicker.h"
 #include "prompts/FilenamePrompt.h"
 #include "prompts/SimpleTextViewController.h"
+#include "screens/list/DocumentListAction.h"
+#include "screens/list/DocumentListController.h"
+#include "screens/move/MoveTargetPicker.h"
 #include "tests/browser/support/BrowserFixture.h"
 
 #include <gmock/gmock.h>

@@ -7,11 +7,11 @@
 #include "kit/View.h"
 #include "kit/Window.h"
 #include "platform/Localization.h"
-#include "platform/components/DocumentListAction.h"
-#include "platform/components/DocumentListController.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
+#include "screens/list/DocumentListAction.h"
+#include "screens/list/DocumentListController.h"
 #include "tests/browser/support/BrowserFixture.h"
 
 #include <gmock/gmock.h>

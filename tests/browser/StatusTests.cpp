@@ -1,11 +1,11 @@
 #include "browser/NavController.h"
 #include "drawing/FileTags.h"
 #include "kit/Label.h"
-#include "platform/components/DocumentListController.h"
-#include "platform/components/StorageUpgradeButton.h"
-#include "platform/components/UpgradeFlow.h"
 #include "preview/PreviewMode.h"
 #include "prompts/DriveStatusLabelView.h"
+#include "screens/StorageUpgradeButton.h"
+#include "screens/UpgradeFlow.h"
+#include "screens/list/DocumentListController.h"
 #include "tests/browser/support/BrowserFixture.h"
 
 #include <gmock/gmock.h>

@@ -4,13 +4,13 @@
 #include "kit/Button.h"
 #include "kit/NavigationItem.h"
 #include "kit/SearchPresentation.h"
-#include "platform/components/DocumentInteractionSheet.h"
-#include "platform/components/DocumentListController.h"
-#include "platform/components/MoveTargetPicker.h"
-#include "platform/components/PreviewScreenView.h"
-#include "platform/components/PreviewSummaryView.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewItemManager.h"
+#include "screens/DocumentInteractionSheet.h"
+#include "screens/list/DocumentListController.h"
+#include "screens/move/MoveTargetPicker.h"
+#include "screens/preview/PreviewScreenView.h"
+#include "screens/preview/PreviewSummaryView.h"
 #include "tests/browser/support/BrowserFixture.h"
 
 #include <gmock/gmock.h>

@@ -1,5 +1,5 @@
 #include "items/MenuEnableChecks.h"
-#include "platform/components/DocumentListController.h"
+#include "screens/list/DocumentListController.h"
 #include "tests/items/support/ItemsFixture.h"
 
 #include <gmock/gmock.h>

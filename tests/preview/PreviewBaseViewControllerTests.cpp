@@ -6,8 +6,8 @@
 #include "kit/NavigationItem.h"
 #include "kit/Screen.h"
 #include "kit/ScrollView.h"
-#include "platform/components/DocumentInteractionSheet.h"
-#include "platform/components/PlaceholderView.h"
+#include "screens/DocumentInteractionSheet.h"
+#include "screens/PlaceholderView.h"
 
 #include <gmock/gmock.h>
 

@@ -6,7 +6,7 @@
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewDetailsViewController.h"
 #include "preview/PreviewItemManager.h"
-#include "tests/components/support/ComponentsFixture.h"
+#include "tests/screens/support/ComponentsFixture.h"
 
 #include <memory>
 #include <string>

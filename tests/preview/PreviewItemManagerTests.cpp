@@ -3,8 +3,8 @@
 #include "PreviewFixture.h"
 #include "items/DRItem.h"
 #include "kit/SearchPresentation.h"
-#include "platform/components/PreviewContent.h"
 #include "preview/LookwellItemController.h"
+#include "screens/preview/PreviewContent.h"
 
 #include <gmock/gmock.h>
 

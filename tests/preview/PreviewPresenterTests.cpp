@@ -2,8 +2,8 @@
 #include "items/FileUtils.h"
 #include "kit/AlertController.h"
 #include "platform/ActivityHandOver.h"
-#include "platform/components/PlaceholderView.h"
-#include "platform/components/PreviewContent.h"
+#include "screens/PlaceholderView.h"
+#include "screens/preview/PreviewContent.h"
 
 #include <fcntl.h>
 #include <gmock/gmock.h>

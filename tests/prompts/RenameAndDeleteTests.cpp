@@ -2,8 +2,8 @@
 #include "kit/BarButtonItem.h"
 #include "kit/View.h"
 #include "kit/Window.h"
-#include "platform/components/DocumentListController.h"
 #include "prompts/UIUtils.h"
+#include "screens/list/DocumentListController.h"
 #include "tests/support/DriveFixture.h"
 
 #include <gmock/gmock.h>

@@ -9,9 +9,9 @@
 #include "kit/AlertController.h"
 #include "kit/Window.h"
 #include "platform/Localization.h"
-#include "platform/components/DocumentListController.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewDetailsViewController.h"
+#include "screens/list/DocumentListController.h"
 #include "tests/support/RecordingSharing.h"
 
 namespace testing_support {

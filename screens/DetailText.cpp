@@ -1,0 +1,28 @@
+#include "screens/DetailText.h"
+
+#include "platform/Localization.h"
+
+namespace platform::components {
+
+namespace {
+
+std::string joined(const char* format, const std::string& first, const std::string& second)
+{
+    if (first.empty() || second.empty())
+        return first + second;
+    return localized(format, {first, second});
+}
+
+} // namespace
+
+std::string joinedDetails(const std::string& first, const std::string& second)
+{
+    return joined("%1$@ · %2$@", first, second);
+}
+
+std::string joinedPlace(const std::string& folder, const std::string& inner)
+{
+    return joined("%1$@ › %2$@", folder, inner);
+}
+
+} // namespace platform::components

@@ -1,0 +1,204 @@
+#include "screens/DocumentInteractionSheet.h"
+
+#include "kit/AlertController.h"
+#include "platform/DocumentSharing.h"
+#include "platform/FileSystem.h"
+#include "platform/Localization.h"
+#include "platform/Services.h"
+#include "screens/ErrorWords.h"
+#include "screens/FolderPlaces.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+using ui::AlertAction;
+using ui::AlertActionStyle;
+using ui::AlertController;
+
+/// The apps that work on a document where it lies, this program left out, those that own its type first.
+std::vector<AppHandle> appsFor(const Url& document)
+{
+    const auto& registry = services().appRegistry();
+    std::vector<AppHandle> apps;
+    for (const auto& [rank, ranked] : registry.availableApps({document})) {
+        for (const auto& app : ranked) {
+            const bool isKnown = std::ranges::find(apps, app) != apps.end();
+            if (app.supportsOpenInPlace && !isKnown && app.bundleIdentifier != registry.ownBundleIdentifier())
+                apps.push_back(app);
+        }
+    }
+    return apps;
+}
+
+} // namespace
+
+std::shared_ptr<DocumentInteractionSheet> DocumentInteractionSheet::interactionControllerWithURL(
+    const Url& url)
+{
+    return std::make_shared<DocumentInteractionSheet>(url);
+}
+
+DocumentInteractionSheet::DocumentInteractionSheet(Url url)
+    : _url(std::move(url))
+    , _name(folderTitle(_url))
+{
+}
+
+bool DocumentInteractionSheet::contentIsHere() const
+{
+    return services().fileSystem().typeOfItem(_url.path()).has_value();
+}
+
+bool DocumentInteractionSheet::openDocumentInPlaceInApp(const AppHandle& app) const
+{
+    return services().appRegistry().openInPlace(_url, app);
+}
+
+void DocumentInteractionSheet::presentOptionsMenuFromRectInView(
+    const std::shared_ptr<ui::ViewController>& presenter, const Rect& rect,
+    const std::shared_ptr<ui::View>& view, bool animated)
+{
+    present(presenter, ui::ViewAnchor{view, rect}, animated);
+}
+
+void DocumentInteractionSheet::presentOptionsMenuFromBarButtonItem(
+    const std::shared_ptr<ui::ViewController>& presenter, const std::shared_ptr<ui::BarButtonItem>& item,
+    bool animated)
+{
+    present(presenter, std::weak_ptr(item), animated);
+}
+
+void DocumentInteractionSheet::present(
+    const std::shared_ptr<ui::ViewController>& presenter, ui::PopoverAnchor anchor, bool animated)
+{
+    _presenter = presenter;
+    _anchor = std::move(anchor);
+    showMenu(makeMenu(contentIsHere() ? appsFor(_url) : Apps()), animated);
+}
+
+void DocumentInteractionSheet::showMenu(const std::shared_ptr<AlertController>& menu, bool animated)
+{
+    const auto presenter = _presenter.lock();
+    if (!presenter)
+        return;
+    menu->setPopoverAnchor(_anchor);
+    presenter->presentViewController(menu, animated);
+}
+
+std::shared_ptr<AlertController> DocumentInteractionSheet::makeMenu(Apps apps)
+{
+    const bool isHere = contentIsHere();
+    const auto menu = std::make_shared<AlertController>(_name,
+        isHere ? std::string() : localized("The content is in the cloud. Open the document to download it."),
+        ui::AlertStyle::ActionSheet);
+    for (std::size_t i = 0; i < std::min(apps.size(), directApps); ++i)
+        addApp(*menu, apps[i]);
+    if (apps.size() > directApps)
+        menu->addAction(std::make_shared<AlertAction>(localized("Other Apps…"), AlertActionStyle::Default,
+            [self = shared_from_this(), others = Apps(apps.begin() + directApps, apps.end())](
+                const auto&) { self->showMenu(self->makeAppMenu(others), true); }));
+    auto& sharing = services().documentSharing();
+    const bool isDocument = services().fileSystem().typeOfItem(_url.path()) == FileType::Regular;
+    if (isDocument && sharing.canSendByMail())
+        add(*menu, localized("Send by Mail"), &DocumentInteractionSheet::sendByMail);
+    add(*menu, localized("Copy Path"), &DocumentInteractionSheet::copyPath);
+    add(*menu, localized("Copy Link"), &DocumentInteractionSheet::copyLink);
+    if (isHere)
+        add(*menu, localized("Show in File Manager"), &DocumentInteractionSheet::showInFileManager);
+    if (isDocument && sharing.canPrint(_url))
+        add(*menu, localized("Print"), &DocumentInteractionSheet::print);
+    addCancel(*menu);
+    return menu;
+}
+
+std::shared_ptr<AlertController> DocumentInteractionSheet::makeAppMenu(const Apps& apps)
+{
+    const auto menu = std::make_shared<AlertController>(_name, std::string(), ui::AlertStyle::ActionSheet);
+    for (const auto& app : apps)
+        addApp(*menu, app);
+    addCancel(*menu);
+    return menu;
+}
+
+void DocumentInteractionSheet::addApp(AlertController& menu, const AppHandle& app)
+{
+    menu.addAction(std::make_shared<AlertAction>(localized("Open in %@", {app.localizedName}),
+        AlertActionStyle::Default, [self = shared_from_this(), app](const auto&) { self->openIn(app); }));
+}
+
+void DocumentInteractionSheet::add(AlertController& menu, const std::string& title, Action action)
+{
+    menu.addAction(std::make_shared<AlertAction>(
+        title, AlertActionStyle::Default, [self = shared_from_this(), action](const auto&) {
+            (self.get()->*action)();
+            self->ended();
+        }));
+}
+
+void DocumentInteractionSheet::addCancel(AlertController& menu)
+{
+    menu.addAction(std::make_shared<AlertAction>(localized("Cancel"), AlertActionStyle::Cancel,
+        [self = shared_from_this()](const auto&) { self->ended(); }));
+}
+
+void DocumentInteractionSheet::ended()
+{
+    if (const auto told = _delegate.lock())
+        told->documentInteractionControllerDidDismissOptionsMenu(shared_from_this());
+}
+
+void DocumentInteractionSheet::openIn(const AppHandle& app)
+{
+    if (!openDocumentInPlaceInApp(app))
+        showFailure(localized("%@ could not be started", {app.localizedName}), {});
+    ended();
+}
+
+void DocumentInteractionSheet::sendByMail()
+{
+    services().documentSharing().sendByMail(_url, reportFailure());
+}
+
+void DocumentInteractionSheet::copyPath()
+{
+    services().documentSharing().copyText(_url.path());
+}
+
+void DocumentInteractionSheet::copyLink()
+{
+    services().documentSharing().copyText(linkToItem(_url));
+}
+
+void DocumentInteractionSheet::showInFileManager()
+{
+    services().documentSharing().showInFileManager(_url, reportFailure());
+}
+
+void DocumentInteractionSheet::print()
+{
+    services().documentSharing().print(_url, reportFailure());
+}
+
+std::function<void(const std::optional<Error>&)> DocumentInteractionSheet::reportFailure()
+{
+    return [self = shared_from_this()](const std::optional<Error>& error) {
+        if (error)
+            self->showFailure(self->_name, errorWords(*error));
+    };
+}
+
+void DocumentInteractionSheet::showFailure(const std::string& title, const std::string& message)
+{
+    const auto presenter = _presenter.lock();
+    if (!presenter)
+        return;
+    const auto alert = std::make_shared<AlertController>(title, message, ui::AlertStyle::Alert);
+    alert->addAction(std::make_shared<AlertAction>(localized("OK"), AlertActionStyle::Cancel));
+    presenter->presentViewController(alert, true);
+}
+
+} // namespace platform::components

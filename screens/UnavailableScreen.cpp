@@ -1,0 +1,30 @@
+#include "screens/UnavailableScreen.h"
+
+#include "platform/Localization.h"
+#include "screens/PlaceholderView.h"
+
+namespace platform::components {
+
+std::shared_ptr<UnavailableScreen> UnavailableScreen::create()
+{
+    return std::make_shared<UnavailableScreen>();
+}
+
+UnavailableScreen::UnavailableScreen()
+{
+    setTitle(localized("Tarrow Drive"));
+}
+
+void UnavailableScreen::loadView()
+{
+    const auto placeholder = PlaceholderView::create();
+    placeholder->setContent({
+        .iconName = "avatar-default-symbolic",
+        .title = localized("You are not signed in"),
+        .message = localized("Sign in to your drive’s account. Your folders and "
+                             "documents appear here as soon as you are signed in."),
+    });
+    setView(placeholder);
+}
+
+} // namespace platform::components

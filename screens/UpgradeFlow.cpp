@@ -1,0 +1,65 @@
+#include "screens/UpgradeFlow.h"
+
+#include "kit/AlertController.h"
+#include "platform/LinkOpener.h"
+#include "platform/Localization.h"
+#include "platform/Services.h"
+#include "screens/ErrorWords.h"
+
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+using ui::AlertAction;
+using ui::AlertActionStyle;
+
+std::shared_ptr<ui::AlertController> makeAlert(const std::string& title, const std::string& message)
+{
+    return std::make_shared<ui::AlertController>(title, message, ui::AlertStyle::Alert);
+}
+
+void showFailure(const std::shared_ptr<ui::ViewController>& presenter, const Error& error)
+{
+    const auto alert = makeAlert(localized("The page cannot be opened"), errorWords(error));
+    alert->addAction(std::make_shared<AlertAction>(localized("OK"), AlertActionStyle::Cancel));
+    presenter->presentViewController(alert, true);
+}
+
+} // namespace
+
+std::shared_ptr<UpgradeFlow> UpgradeFlow::initWithOffer(std::shared_ptr<const StorageOffer> offer)
+{
+    return std::make_shared<UpgradeFlow>(std::move(offer));
+}
+
+void UpgradeFlow::beginWithPresentingViewController(const std::shared_ptr<ui::ViewController>& presenter)
+{
+    if (!_offer || !presenter)
+        return;
+    const auto alert = makeAlert(localized("Get More Storage"),
+        localized("The page where you can choose more storage for your drive opens in your web browser."));
+    alert->addAction(std::make_shared<AlertAction>(localized("Cancel"), AlertActionStyle::Cancel));
+    const auto proceed = std::make_shared<AlertAction>(localized("Open Page"), AlertActionStyle::Default,
+        [self = shared_from_this(), weak = std::weak_ptr(presenter)](const auto&) {
+            if (const auto screen = weak.lock())
+                self->openPage(screen);
+        });
+    proceed->setEnabled(!_offer->link.target.empty());
+    alert->addAction(proceed);
+    alert->setPreferredAction(proceed);
+    presenter->presentViewController(alert, true);
+}
+
+void UpgradeFlow::openPage(const std::shared_ptr<ui::ViewController>& presenter)
+{
+    services().linkOpener().openLink(
+        _offer->link.target, [weak = std::weak_ptr(presenter)](const std::optional<Error>& error) {
+            const auto screen = weak.lock();
+            if (error && screen)
+                showFailure(screen, *error);
+        });
+}
+
+} // namespace platform::components

@@ -1,0 +1,292 @@
+#include "screens/list/DocumentListController.h"
+
+#include "kit/AlertAction.h"
+#include "kit/AlertController.h"
+#include "kit/ListView.h"
+#include "platform/CloudDocumentService.h"
+#include "platform/Localization.h"
+#include "platform/Services.h"
+#include "screens/ErrorWords.h"
+#include "screens/list/DocumentPeek.h"
+#include "screens/list/DocumentRowSource.h"
+#include "screens/list/FolderContents.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+struct ActionEntry {
+    DocumentListAction action;
+    const char* title;
+    ui::MenuActionStyle style;
+    bool forLibraries; ///< whether an app library offers it
+};
+
+constexpr ActionEntry menuEntries[] = {
+    {DocumentListAction::Info, "Info", ui::MenuActionStyle::Default, true},
+    {DocumentListAction::Share, "Share", ui::MenuActionStyle::Default, true},
+    {DocumentListAction::Rename, "Rename", ui::MenuActionStyle::Default, false},
+    {DocumentListAction::Move, "Move", ui::MenuActionStyle::Default, false},
+    {DocumentListAction::More, "More", ui::MenuActionStyle::Default, true},
+    {DocumentListAction::Delete, "Delete", ui::MenuActionStyle::Destructive, true},
+};
+
+bool opensAsFolder(FolderEntryKind kind)
+{
+    return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
+}
+
+} // namespace
+
+std::size_t DocumentListController::containedItemCount() const
+{
+    return _contents ? _contents->rows()->count() : 0;
+}
+
+std::vector<Url> DocumentListController::containedItems() const
+{
+    std::vector<Url> items;
+    items.reserve(containedItemCount());
+    for (std::size_t row = 0; row < containedItemCount(); ++row)
+        items.push_back(_contents->rows()->url(row));
+    return items;
+}
+
+std::size_t DocumentListController::selectedItemCount() const
+{
+    return _listView ? _listView->selection().count() : 0;
+}
+
+std::vector<Url> DocumentListController::selectedItems() const
+{
+    std::vector<Url> items;
+    if (selectedItemCount() == 0)
+        return items;
+    const auto& rows = *_contents->rows();
+    for (std::size_t row = 0; row < rows.count() && items.size() < selectedItemCount(); ++row) {
+        if (_listView->selection().contains(rows.ids()[row]))
+            items.push_back(rows.url(row));
+    }
+    return items;
+}
+
+void DocumentListController::setSelectedItems(const std::vector<Url>& items)
+{
+    if (!_editing || !_contents || !isViewLoaded())
+        return;
+    ui::SelectionModel selection;
+    for (const auto& item : items)
+        selection.select(_contents->rows()->idFor(item));
+    _listView->setSelection(std::move(selection));
+    selectionDidChange(*_listView);
+}
+
+void DocumentListController::selectAllItems()
+{
+    if (_editing && isViewLoaded())
+        _listView->selectAllByUser();
+}
+
+void DocumentListController::deselectAllItems()
+{
+    setSelectedItems({});
+}
+
+void DocumentListController::setEditingAnimated(bool editing, bool)
+{
+    _editing = editing;
+    if (isViewLoaded())
+        offerSearch();
+    if (isViewLoaded())
+        _listView->setSelectionMode(editing ? ui::SelectionMode::Multiple : ui::SelectionMode::None);
+}
+
+void DocumentListController::selectionDidChange(ui::ListView&)
+{
+    if (const auto told = delegate())
+        told->documentListControllerItemsChanged(self());
+}
+
+void DocumentListController::visibleRowsDidChange(ui::ListView&, ui::RowRange)
+{
+    _rows->visibleRowsDidChange();
+}
+
+void DocumentListController::refreshRequested(ui::ListView&)
+{
+    refresh();
+}
+
+void DocumentListController::rowActivated(ui::ListView&, std::size_t index)
+{
+    const auto rows = _rows->rows();
+    if (rows && index < rows->count())
+        open(rows->url(index), rows->entry(index).kind);
+}
+
+void DocumentListController::open(const Url& url, FolderEntryKind kind)
+{
+    const auto told = delegate();
+    if (!told)
+        return;
+    if (opensAsFolder(kind))
+        told->documentListControllerDidSelectContainerWithViewController(self(), initWithURL(url));
+    else
+        told->documentListControllerDidSelectItemAtURL(self(), url);
+}
+
+ui::Menu DocumentListController::menuForRow(ui::ListView&, std::size_t index)
+{
+    ui::Menu menu;
+    const auto rows = _rows->rows();
+    if (_editing || !rows || index >= rows->count())
+        return menu;
+    const auto kind = rows->entry(index).kind;
+    if (rows->entry(index).isPromise)
+        menu.push_back(downloadEntry(rows->url(index)));
+    for (const auto& entry : menuEntries) {
+        if (!offers(entry.action, kind))
+            continue;
+        auto chosen = [weak = std::weak_ptr(self()), action = entry.action, url = rows->url(index)] {
+            if (const auto list = weak.lock())
+                list->perform(action, url);
+        };
+        menu.push_back({.title = localized(entry.title),
+            .handler = std::move(chosen),
+            .style = entry.style,
+            .image = {}});
+    }
+    return menu;
+}
+
+ui::MenuAction DocumentListController::downloadEntry(const Url& url)
+{
+    const bool isRunning = services().cloudDocumentService().items().downloadProgress(url).has_value();
+    auto chosen = [weak = std::weak_ptr(self()), url, isRunning] {
+        if (isRunning)
+            services().cloudDocumentService().items().cancelDownload(url);
+        else if (const auto list = weak.lock())
+            list->download(url);
+    };
+    return {.title = isRunning ? localized("Cancel Download") : localized("Download"),
+        .handler = std::move(chosen),
+        .image = {}};
+}
+
+/// Goes on when the list is left: only a failure is told in the list.
+void DocumentListController::download(const Url& url)
+{
+    services().cloudDocumentService().items().download(
+        url, [weak = std::weak_ptr(self())](const std::optional<Error>& error) {
+            const auto list = weak.lock();
+            if (!list || !error || error->is(FileErrorCode::Cancelled))
+                return;
+            const auto alert = std::make_shared<ui::AlertController>(
+                localized("It could not be downloaded."), errorWords(*error), ui::AlertStyle::Alert);
+            alert->addAction(
+                std::make_shared<ui::AlertAction>(localized("OK"), ui::AlertActionStyle::Default));
+            list->presentViewController(alert, true);
+        });
+}
+
+void DocumentListController::perform(DocumentListAction action, const Url& url)
+{
+    if (const auto told = delegate())
+        told->documentListControllerPerformActionURLOriginatingViewCompletion(
+            self(), static_cast<int>(action), url, anchorFor(url), {});
+}
+
+std::shared_ptr<ui::View> DocumentListController::anchorFor(const Url& url)
+{
+    const auto rows = _rows->rows();
+    const auto [first, count] = _listView->visibleRows();
+    for (std::size_t index = first; rows && index < std::min(first + count, rows->count()); ++index) {
+        if (rows->url(index) != url)
+            continue;
+        const double top = static_cast<double>(index) * _listView->rowHeight() - _listView->contentOffset().y;
+        const auto& list = _listView->frame();
+        _rowAnchor->setFrame({list.x, list.y + top, list.width, _listView->rowHeight()});
+        return _rowAnchor;
+    }
+    return _listView;
+}
+
+bool DocumentListController::offers(DocumentListAction action, FolderEntryKind kind) const
+{
+    const auto* entry = std::ranges::find(menuEntries, action, &ActionEntry::action);
+    const bool isForKind =
+        entry == std::end(menuEntries) || entry->forLibraries || kind != FolderEntryKind::Library;
+    return isForKind && (_availableActions & actionBit(action)) != 0;
+}
+
+bool DocumentListController::rowCommand(ui::ListView& list, std::size_t index, ui::RowCommand command)
+{
+    if (command == ui::RowCommand::Peek)
+        return rowHeld(list, index);
+    constexpr std::pair<ui::RowCommand, DocumentListAction> actions[] = {
+        {ui::RowCommand::Rename, DocumentListAction::Rename},
+        {ui::RowCommand::Delete, DocumentListAction::Delete},
+        {ui::RowCommand::Info, DocumentListAction::Info},
+    };
+    const auto* action =
+        std::ranges::find(actions, command, &std::pair<ui::RowCommand, DocumentListAction>::first);
+    const auto rows = _rows->rows();
+    if (action == std::end(actions) || !rows || index >= rows->count()
+        || !offers(action->second, rows->entry(index).kind))
+        return false;
+    perform(action->second, rows->url(index));
+    return true;
+}
+
+bool DocumentListController::rowHeld(ui::ListView& list, std::size_t index)
+{
+    const auto told = delegate();
+    const auto rows = _rows->rows();
+    if (!told || _editing || !rows || index >= rows->count())
+        return false;
+    const auto url = rows->url(index);
+    const auto screen = told->documentListControllerViewControllerForPreviewingItemAtURL(self(), url);
+    if (!screen)
+        return false;
+    const auto open = [weak = std::weak_ptr(self()), url, kind = rows->entry(index).kind] {
+        if (const auto peeked = weak.lock())
+            peeked->openFromPeek(url, kind);
+    };
+    const auto title = _listView->row(index).title;
+    const auto peek = DocumentPeek::make(title, screen, menuForRow(list, index), open);
+    _peek = peek;
+    presentViewController(peek, true);
+    return true;
+}
+
+void DocumentListController::heldRowPressedOn(ui::ListView&)
+{
+    const auto peek = _peek.lock();
+    if (peek && presentedViewController() == peek)
+        peek->press(peek->preferredAction());
+}
+
+void DocumentListController::openFromPeek(const Url& url, FolderEntryKind kind)
+{
+    if (offers(DocumentListAction::PressurePop, kind))
+        perform(DocumentListAction::PressurePop, url);
+    else
+        open(url, kind);
+}
+
+void DocumentListController::selectionRequested(ui::ListView&)
+{
+    if (const auto told = delegate())
+        told->documentListControllerRequestsEditing(self());
+}
+
+void DocumentListController::openOutOfDriveViewControllerAction(
+    const Url&, const std::shared_ptr<ui::ViewController>&, const std::function<void()>& action)
+{
+    action();
+}
+
+} // namespace platform::components

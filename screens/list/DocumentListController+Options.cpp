@@ -1,0 +1,83 @@
+// The order of a list, and the menu in which it is chosen.
+
+#include "platform/Localization.h"
+#include "screens/list/DocumentListController.h"
+
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+struct KeyEntry {
+    OrderKey key;
+    const char* title;
+};
+
+constexpr KeyEntry keyEntries[] = {
+    {OrderKey::Name, "Name"},
+    {OrderKey::Date, "Date"},
+    {OrderKey::Size, "Size"},
+    {OrderKey::Kind, "Kind"},
+};
+
+ui::MenuMark markIf(bool on)
+{
+    return on ? ui::MenuMark::On : ui::MenuMark::Off;
+}
+
+} // namespace
+
+void DocumentListController::setOrder(const ListOrder& order)
+{
+    if (order == _order || !_presentedURL)
+        return;
+    _order = order;
+    saveOrder(*_presentedURL, order);
+    _isReordered = true;
+    refresh();
+}
+
+ui::Menu DocumentListController::optionsMenu()
+{
+    ui::Menu menu;
+    const auto calling = [this](auto operation) {
+        return [weak = std::weak_ptr(self()), operation] {
+            if (const auto list = weak.lock())
+                operation(*list);
+        };
+    };
+    const auto choice = [&](const char* title, const ListOrder& order, bool isPresent) {
+        ui::MenuAction action;
+        action.title = localized(title);
+        action.handler = calling([order](DocumentListController& list) { list.setOrder(order); });
+        action.mark = markIf(isPresent);
+        menu.push_back(std::move(action));
+    };
+    if (_editing) {
+        menu.push_back({.title = localized("Select All"),
+            .handler = calling([](DocumentListController& list) { list.selectAllItems(); })});
+        menu.push_back({.title = localized("Select None"),
+            .handler = calling([](DocumentListController& list) { list.deselectAllItems(); })});
+    }
+    const auto firstChoice = menu.size();
+    for (const auto& entry : keyEntries)
+        choice(entry.title, _order.key == entry.key ? _order : _order.sortedBy(entry.key),
+            _order.key == entry.key);
+    menu[firstChoice].beginsSection = _editing;
+    const auto directionStart = menu.size();
+    for (const auto direction : {OrderDirection::Ascending, OrderDirection::Descending}) {
+        const bool ascends = direction == OrderDirection::Ascending;
+        choice(ascends ? "Ascending" : "Descending", {_order.key, direction, _order.grouping},
+            _order.direction == direction);
+    }
+    menu[directionStart].beginsSection = true;
+    const bool grouped = _order.grouping == FolderGrouping::FoldersFirst;
+    choice("Folders First",
+        {_order.key, _order.direction, grouped ? FolderGrouping::Mixed : FolderGrouping::FoldersFirst},
+        grouped);
+    menu.back().beginsSection = true;
+    return menu;
+}
+
+} // namespace platform::components

@@ -1,0 +1,302 @@
+#include "screens/list/DocumentListController.h"
+
+#include "kit/ListView.h"
+#include "kit/NavigationController.h"
+#include "kit/NavigationItem.h"
+#include "platform/Dispatch.h"
+#include "platform/FolderLister.h"
+#include "platform/Localization.h"
+#include "platform/Services.h"
+#include "screens/ErrorWords.h"
+#include "screens/FolderPlaces.h"
+#include "screens/PlaceholderView.h"
+#include "screens/list/DocumentRowSource.h"
+#include "screens/list/DocumentSearch.h"
+#include "screens/list/FolderContents.h"
+
+#include <chrono>
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+/// A folder that is listed sooner never shows that it was loading.
+constexpr auto loadingDelay = std::chrono::milliseconds(300);
+constexpr auto librarySettles = std::chrono::seconds(1);
+
+void fill(ui::View& parent, const std::shared_ptr<ui::View>& view)
+{
+    view->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
+    view->setFrame(parent.bounds());
+    parent.addSubview(view);
+}
+
+} // namespace
+
+std::shared_ptr<DocumentListController> DocumentListController::createRootList()
+{
+    const auto folder = rootFolder();
+    return folder ? initWithURL(*folder) : nullptr;
+}
+
+std::shared_ptr<DocumentListController> DocumentListController::initWithURL(const Url& url)
+{
+    return std::make_shared<DocumentListController>(url);
+}
+
+std::vector<std::shared_ptr<DocumentListController>> DocumentListController::hierarchyForURL(const Url& url)
+{
+    std::vector<std::shared_ptr<DocumentListController>> lists;
+    for (const auto& folder : foldersDownTo(url))
+        lists.push_back(initWithURL(folder));
+    return lists;
+}
+
+DocumentListController::DocumentListController(std::optional<Url> folder)
+    : _presentedURL(std::move(folder))
+{
+    if (_presentedURL)
+        setTitle(folderTitle(*_presentedURL));
+}
+
+DocumentListController::~DocumentListController() = default;
+
+std::shared_ptr<DocumentListController> DocumentListController::self()
+{
+    return std::static_pointer_cast<DocumentListController>(shared_from_this());
+}
+
+void DocumentListController::setDelegate(std::weak_ptr<DocumentListControllerDelegate> delegate)
+{
+    _delegate = std::move(delegate);
+    if (!_rows)
+        return;
+    _rows->setTagColors([weak = std::weak_ptr(self())](const std::vector<std::string>& names) {
+        const auto list = weak.lock();
+        const auto colors = list ? list->delegate() : nullptr;
+        return colors ? colors->documentListControllerColorsForTagNames(list, names) : std::vector<Color>();
+    });
+}
+
+void DocumentListController::loadView()
+{
+    const auto view = std::make_shared<ui::View>();
+    _listView = std::make_shared<ui::ListView>();
+    _listView->setAccessibility({.label = title(), .hint = {}});
+    _listView->setRefreshable(true);
+    _placeholder = PlaceholderView::create();
+    _placeholder->setHidden(true);
+    fill(*view, _listView);
+    fill(*view, _placeholder);
+    _rowAnchor = std::make_shared<ui::View>();
+    _rowAnchor->setHidden(true);
+    view->addSubview(_rowAnchor);
+    setView(view);
+}
+
+void DocumentListController::viewDidLoad()
+{
+    _rows = DocumentRowSource::create(_listView);
+    setDelegate(_delegate);
+    _listView->setDataSource(_rows);
+    _listView->setListDelegate(
+        std::shared_ptr<ui::ListViewDelegate>(self(), static_cast<ui::ListViewDelegate*>(this)));
+    _listView->setSelectionMode(_editing ? ui::SelectionMode::Multiple : ui::SelectionMode::None);
+    offerSearch();
+    if (!_presentedURL)
+        return;
+    _order = savedOrder(*_presentedURL);
+    navigationItem().setMenu(localized("Order and Options"), [weak = std::weak_ptr(self())] {
+        const auto list = weak.lock();
+        return list ? list->optionsMenu() : ui::Menu();
+    });
+    _contents = FolderContents::create(
+        *_presentedURL, [weak = std::weak_ptr(self())](const FolderContentsUpdate& update) {
+            if (const auto list = weak.lock())
+                list->contentsDidChange(update);
+        });
+    refresh();
+    followLibraries();
+    showLoadingAfterDelay();
+}
+
+void DocumentListController::takeKeyboard()
+{
+    // A list in a peek leaves the keyboard to the peek, one under a search or a question to that.
+    const auto stack = navigationController();
+    const bool isOnTop = stack && stack->topViewController().get() == this && !presentedViewController();
+    if (_hasTakenKeyboard || !isOnTop || appearanceState() != ui::AppearanceState::Appeared
+        || containedItemCount() == 0)
+        return;
+    _hasTakenKeyboard = true;
+    _listView->becomeFirstResponder();
+}
+
+void DocumentListController::offerSearch()
+{
+    // While items are chosen a result could not be opened, and a narrow bar has no room to spare.
+    if (!shouldShowSearch() || _editing)
+        return navigationItem().setSearchAction({});
+    navigationItem().setSearchAction([weak = std::weak_ptr(self())] {
+        // A key reaches the button also while something lies over the list.
+        if (const auto list = weak.lock(); list && !list->presentedViewController())
+            list->startSearchWithQueryStringBecomeFirstResponder({}, true);
+    });
+}
+
+void DocumentListController::refresh()
+{
+    if (!_contents)
+        return;
+    _shownLibraries = extraItemsOf(*_presentedURL);
+    _contents->start(_shownLibraries, _order);
+}
+
+void DocumentListController::followLibraries()
+{
+    if (rootFolder() != _presentedURL)
+        return;
+    _libraries = services().folderLister().list(_presentedURL->deletingLastPathComponent(), {},
+        FolderGrouping::FoldersFirst, [weak = std::weak_ptr(self())](const auto&) {
+            const auto list = weak.lock();
+            if (!list)
+                return;
+            list->librariesMayHaveChanged();
+            // What a library is called may be written after its folder.
+            auto& dispatch = services().dispatch();
+            dispatch.after(librarySettles, dispatch.mainQueue(), [weak] {
+                if (const auto later = weak.lock())
+                    later->librariesMayHaveChanged();
+            });
+        });
+}
+
+void DocumentListController::librariesMayHaveChanged()
+{
+    if (extraItemsOf(*_presentedURL) != _shownLibraries)
+        refresh();
+}
+
+void DocumentListController::viewDidAppear(bool animated)
+{
+    ui::ViewController::viewDidAppear(animated);
+    _hasTakenKeyboard = false;
+    takeKeyboard();
+    // The folders in it may hold something else since they were looked at.
+    if (_rows) {
+        _rows->invalidateDetails(std::vector<ui::RowId>());
+        _rows->visibleRowsDidChange();
+    }
+    // The delegate takes the list off the stack, which must not happen while the stack is still moving.
+    if (_wasRemoved)
+        services().dispatch().mainQueue()->async([weak = std::weak_ptr(self())] {
+            if (const auto list = weak.lock())
+                list->reportRemovalIfShown();
+        });
+}
+
+void DocumentListController::contentsDidChange(const FolderContentsUpdate& update)
+{
+    const auto keepsAlive = self();
+    _state = update.stage;
+    _failure = update.error;
+    _rows->setRows(update.rows);
+    _rows->invalidateDetails(update.touched);
+    if (std::exchange(_isReordered, false)) {
+        // Nearly every row has moved: one begins at the top again.
+        _hasTakenKeyboard = false;
+        _listView->reloadAll();
+        _listView->scrollToRow(0, ui::RowPosition::Top, false);
+    } else {
+        _listView->apply(update.changes);
+    }
+    _rows->visibleRowsDidChange();
+    if (update.stage != ListingStage::FirstRows)
+        _listView->endRefreshing();
+    showStateOfFolder();
+    takeKeyboard();
+    if (const auto told = delegate())
+        told->documentListControllerItemsChanged(keepsAlive);
+    _wasRemoved = update.error && saysItemIsGone(*update.error);
+    reportRemovalIfShown();
+}
+
+void DocumentListController::showStateOfFolder()
+{
+    const bool isEmpty = containedItemCount() == 0;
+    _placeholder->setHidden(!isEmpty || _state == ListingStage::FirstRows);
+    if (!isEmpty) {
+        navigationItem().setSubtitle(_failure ? localized("Some items could not be read") : std::string());
+    } else if (_failure) {
+        _placeholder->setContent({.iconName = "dialog-warning-symbolic",
+            .title = localized("This folder cannot be shown"),
+            .message = errorWords(*_failure)});
+    } else {
+        _placeholder->setContent({.iconName = "folder-open-symbolic",
+            .title = localized("Folder is empty"),
+            .message = localized("What you put into this folder appears here.")});
+    }
+}
+
+void DocumentListController::showLoadingAfterDelay()
+{
+    auto& dispatch = services().dispatch();
+    dispatch.after(loadingDelay, dispatch.mainQueue(), [weak = std::weak_ptr(self())] {
+        const auto list = weak.lock();
+        if (!list || list->_state)
+            return;
+        list->_placeholder->setContent({.message = localized("Loading…"), .isBusy = true});
+        list->_placeholder->setHidden(false);
+    });
+}
+
+void DocumentListController::reportRemovalIfShown()
+{
+    if (!_wasRemoved || _reportedRemoval || appearanceState() != ui::AppearanceState::Appeared)
+        return;
+    const auto told = delegate();
+    _reportedRemoval = told != nullptr;
+    if (told)
+        told->documentListControllerURLWasRemoved(self());
+}
+
+void DocumentListController::startSearchWithQueryStringBecomeFirstResponder(
+    const std::string& query, bool becomeFirstResponder)
+{
+    view();
+    const auto weak = std::weak_ptr(self());
+    _search = DocumentSearch::create({
+        .chosen =
+            [weak](const Url& url, FolderEntryKind kind) {
+                if (const auto list = weak.lock())
+                    list->open(url, kind);
+            },
+        .showInFolder =
+            [weak](const Url& url) {
+                if (const auto list = weak.lock())
+                    list->open(url.deletingLastPathComponent(), FolderEntryKind::Folder);
+            },
+    });
+    const auto presentation = _search->presentation();
+    presentation->setQuery(query);
+    presentation->setFocus(becomeFirstResponder);
+    presentViewController(presentation, true);
+}
+
+void DocumentListController::setAssociatedObject(const std::string& key, std::shared_ptr<void> object)
+{
+    if (object)
+        _associatedObjects.insert_or_assign(key, std::move(object));
+    else
+        _associatedObjects.erase(key);
+}
+
+std::string logText(const std::shared_ptr<DocumentListController>& list)
+{
+    if (!list || !list->presentedURL())
+        return "<DocumentListController>";
+    return "<DocumentListController " + list->presentedURL()->path() + ">";
+}
+
+} // namespace platform::components

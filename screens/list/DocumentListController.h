@@ -1,0 +1,173 @@
+#pragma once
+
+#include "kit/ListViewDelegate.h"
+#include "kit/ViewController.h"
+#include "platform/Error.h"
+#include "platform/FolderSnapshot.h"
+#include "platform/Url.h"
+#include "screens/list/DocumentListAction.h"
+#include "screens/list/DocumentListControllerDelegate.h"
+#include "screens/list/ListOrder.h"
+
+#include <functional>
+#include <map>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace platform {
+class FolderListing;
+}
+namespace platform::ui {
+class AlertController;
+class ListView;
+} // namespace platform::ui
+
+namespace platform::components {
+
+class DocumentRowSource;
+class DocumentSearch;
+class FolderContents;
+class PlaceholderView;
+struct FolderContentsUpdate;
+
+/// The screen that shows one folder of the drive. It begins to list the folder when its view is loaded and
+/// follows every change from then on. Main thread only; nothing that could wait is done there.
+class DocumentListController : public ui::ViewController, private ui::ListViewDelegate {
+public:
+    /// The list of the drive's top level, which shows the app libraries as well; null when there is no
+    /// default container (signed out).
+    static std::shared_ptr<DocumentListController> createRootList();
+    static std::shared_ptr<DocumentListController> initWithURL(const Url& url);
+    /// The lists from the drive's top level down to a folder, in this order, each of its own; empty when the
+    /// folder does not lie in the default container or in an app library.
+    static std::vector<std::shared_ptr<DocumentListController>> hierarchyForURL(const Url& url);
+
+    /// For derived lists; without a folder the list stays empty.
+    explicit DocumentListController(std::optional<Url> folder);
+    ~DocumentListController() override;
+
+    void setDelegate(std::weak_ptr<DocumentListControllerDelegate> delegate);
+    std::shared_ptr<DocumentListControllerDelegate> delegate() const { return _delegate.lock(); }
+
+    const std::optional<Url>& presentedURL() const { return _presentedURL; }
+    /// Makes a URL for every item: for 100,000 items that is a lot; ask for the count where that is enough.
+    std::vector<Url> containedItems() const;
+    /// The number of items listed so far.
+    std::size_t containedItemCount() const;
+
+    /// In the order of the list.
+    std::vector<Url> selectedItems() const;
+    std::size_t selectedItemCount() const;
+    /// URLs that are no items of the list are ignored. Only an editing list selects.
+    void setSelectedItems(const std::vector<Url>& items);
+
+    /// Selects every item, which makes no URL; the delegate is told.
+    void selectAllItems();
+    void deselectAllItems();
+
+    bool editing() const { return _editing; }
+    /// While editing, taps toggle check marks and nothing is opened. Leaving it clears the selection.
+    void setEditingAnimated(bool editing, bool animated);
+
+    /// The actions that an item's menu offers; none at first.
+    DocumentListActionSet availableActions() const { return _availableActions; }
+    void setAvailableActions(DocumentListActionSet actions) { _availableActions = actions; }
+
+    /// Presents the search field with a query, over the list; with `becomeFirstResponder` it takes the
+    /// keyboard. Searches the names of this list's items.
+    void startSearchWithQueryStringBecomeFirstResponder(const std::string& query, bool becomeFirstResponder);
+    /// Whether the list offers a search field of its own.
+    virtual bool shouldShowSearch() const { return true; }
+
+    /// Runs an action that opens a document outside the program once what must be asked first was answered;
+    /// nothing needs to be asked here, so the action runs at once.
+    static void openOutOfDriveViewControllerAction(const Url& document,
+        const std::shared_ptr<ui::ViewController>& viewController, const std::function<void()>& action);
+
+    /// Lists the folder anew.
+    void refresh();
+
+    /// The order of the items; once the view is loaded the user's choice for this folder.
+    const ListOrder& order() const { return _order; }
+    /// Shows another order and keeps it for the folder.
+    void setOrder(const ListOrder& order);
+    /// The choices of order, and while editing what can be selected at once.
+    ui::Menu optionsMenu();
+
+    /// Objects that others attach to the list, kept as long as it lives; null removes. Ask with the type that
+    /// was attached.
+    void setAssociatedObject(const std::string& key, std::shared_ptr<void> object);
+    template <typename T>
+    std::shared_ptr<T> associatedObject(const std::string& key) const
+    {
+        const auto found = _associatedObjects.find(key);
+        return found == _associatedObjects.end() ? nullptr : std::static_pointer_cast<T>(found->second);
+    }
+
+    void loadView() override;
+    void viewDidLoad() override;
+    void viewDidAppear(bool animated) override;
+
+    /// The parts of the loaded view.
+    const std::shared_ptr<ui::ListView>& listView() const { return _listView; }
+    const std::shared_ptr<PlaceholderView>& placeholder() const { return _placeholder; }
+
+private:
+    void rowActivated(ui::ListView& list, std::size_t index) override;
+    ui::Menu menuForRow(ui::ListView& list, std::size_t index) override;
+    ui::Menu menuForList(ui::ListView&) override { return optionsMenu(); }
+    void visibleRowsDidChange(ui::ListView& list, ui::RowRange range) override;
+    void selectionDidChange(ui::ListView& list) override;
+    void refreshRequested(ui::ListView& list) override;
+    bool rowCommand(ui::ListView& list, std::size_t index, ui::RowCommand command) override;
+    bool rowHeld(ui::ListView& list, std::size_t index) override;
+    void heldRowPressedOn(ui::ListView& list) override;
+    void selectionRequested(ui::ListView& list) override;
+
+    std::shared_ptr<DocumentListController> self();
+    void contentsDidChange(const FolderContentsUpdate& update);
+    void showStateOfFolder();
+    void offerSearch();
+    /// Once for each appearance, as soon as there are rows.
+    void takeKeyboard();
+    void followLibraries();
+    void librariesMayHaveChanged();
+    void showLoadingAfterDelay();
+    void reportRemovalIfShown();
+    void open(const Url& url, FolderEntryKind kind);
+    void perform(DocumentListAction action, const Url& url);
+    ui::MenuAction downloadEntry(const Url& url);
+    void download(const Url& url);
+    /// The place of an item's row, for what points there; the list's when the row is not seen.
+    std::shared_ptr<ui::View> anchorFor(const Url& url);
+    void openFromPeek(const Url& url, FolderEntryKind kind);
+    /// Whether an item may be done something to: the action is enabled, and its kind of item has it.
+    bool offers(DocumentListAction action, FolderEntryKind kind) const;
+
+    std::optional<Url> _presentedURL;
+    std::weak_ptr<ui::AlertController> _peek; ///< the latest
+    std::weak_ptr<DocumentListControllerDelegate> _delegate;
+    std::shared_ptr<ui::ListView> _listView;
+    std::shared_ptr<PlaceholderView> _placeholder;
+    std::shared_ptr<ui::View> _rowAnchor; ///< never seen
+    std::shared_ptr<DocumentRowSource> _rows;
+    std::shared_ptr<FolderContents> _contents;
+    std::shared_ptr<DocumentSearch> _search;
+    std::shared_ptr<FolderListing> _libraries; ///< of the drive's top level: tells when libraries come or go
+    std::vector<FolderSnapshot::ExtraItem> _shownLibraries;
+    std::map<std::string, std::shared_ptr<void>> _associatedObjects;
+    DocumentListActionSet _availableActions = 0;
+    ListOrder _order;
+    bool _editing = false;
+    std::optional<ListingStage> _state; ///< of the latest update; nothing before the first
+    std::optional<Error> _failure;
+    bool _wasRemoved = false, _reportedRemoval = false, _hasTakenKeyboard = false;
+    bool _isReordered = false; ///< the next update brings another order
+};
+
+/// How a list reads in a log line.
+std::string logText(const std::shared_ptr<DocumentListController>& list);
+
+} // namespace platform::components

@@ -1,0 +1,13 @@
+#include "screens/list/DocumentListControllerDelegate.h"
+
+#include "kit/StandardColors.h"
+
+namespace platform::components {
+
+std::vector<Color> DocumentListControllerDelegate::documentListControllerColorsForTagNames(
+    const List&, const std::vector<std::string>& names)
+{
+    return std::vector<Color>(names.size(), ui::StandardColors::gray);
+}
+
+} // namespace platform::components

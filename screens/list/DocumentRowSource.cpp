@@ -1,0 +1,290 @@
+#include "screens/list/DocumentRowSource.h"
+
+#include "kit/ListView.h"
+#include "platform/CloudDocumentService.h"
+#include "platform/Localization.h"
+#include "platform/Services.h"
+#include "platform/TypeRegistry.h"
+#include "screens/DetailText.h"
+#include "screens/DisplayName.h"
+#include "screens/list/RowThumbnail.h"
+
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+constexpr const char* folderIcon = "folder";
+constexpr const char* plainDocumentIcon = "text-x-generic";
+constexpr const char* linkIcon = "emblem-symbolic-link";
+
+bool opensAsFolder(FolderEntryKind kind)
+{
+    return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
+}
+
+std::string spokenDescription(
+    const ui::ListRow& row, const std::string& kind, const std::vector<std::string>& tagNames)
+{
+    std::string spoken = row.title;
+    const auto add = [&spoken](const std::string& part) {
+        if (!part.empty())
+            spoken += ", " + part;
+    };
+    add(kind);
+    add(row.detail);
+    if (row.download == ui::DownloadState::Downloading)
+        add(localized("Downloading"));
+    if (row.download == ui::DownloadState::InCloud)
+        add(localized("In the cloud"));
+    for (const auto& name : tagNames)
+        add(name);
+    return spoken;
+}
+
+} // namespace
+
+std::shared_ptr<DocumentRowSource> DocumentRowSource::create(const std::shared_ptr<ui::ListView>& list)
+{
+    const auto source = std::make_shared<DocumentRowSource>(list);
+    const std::weak_ptr weak = source;
+    source->_loader = std::make_shared<Loader>(
+        "row details", QualityOfService::UserInitiated,
+        [](const RowRequest& request) { return readRowDetails(request.url, request.kind); },
+        [weak](ui::RowId id, RowDetails details) {
+            if (const auto self = weak.lock())
+                self->detailsArrived(id, std::move(details));
+        });
+    source->_thumbnails = std::make_shared<ThumbnailLoader>(
+        "row thumbnails", QualityOfService::Utility,
+        [](const RowRequest& request) { return readRowThumbnail(request.url); },
+        [weak](ui::RowId id, std::optional<Image> thumbnail) {
+            if (const auto self = weak.lock())
+                self->thumbnailArrived(id, std::move(thumbnail));
+        });
+    source->followDownloads();
+    return source;
+}
+
+DocumentRowSource::DocumentRowSource(const std::shared_ptr<ui::ListView>& list)
+    : _list(list)
+{
+}
+
+std::size_t DocumentRowSource::numberOfRows(const ui::ListView&) const
+{
+    return _rows ? _rows->count() : 0;
+}
+
+ui::RowId DocumentRowSource::rowIdAtIndex(const ui::ListView&, std::size_t index) const
+{
+    return _rows->ids()[index];
+}
+
+std::optional<std::size_t> DocumentRowSource::rowBeginningWith(
+    const ui::ListView&, std::string_view text, std::size_t from) const
+{
+    return _rows ? _rows->rowBeginningWith(text, from) : std::nullopt;
+}
+
+ui::ListRow DocumentRowSource::rowAtIndex(const ui::ListView&, std::size_t index) const
+{
+    const auto entry = _rows->entry(index);
+    ui::ListRow row;
+    row.id = _rows->ids()[index];
+    row.image = iconFor(index, entry);
+    row.title = displayName(entry.name);
+    row.accessory = opensAsFolder(entry.kind) ? ui::RowAccessory::Disclosure : ui::RowAccessory::None;
+    row.download = entry.isPromise ? ui::DownloadState::InCloud : ui::DownloadState::Present;
+    const auto known = _known.find(row.id);
+    const bool isKnown = known != _known.end();
+    if (isKnown)
+        complete(row, known->second.details);
+    if (row.download == ui::DownloadState::InCloud)
+        showDownload(row, index);
+    if (isKnown && known->second.thumbnail)
+        row.image = known->second.thumbnail;
+    if (_places)
+        row.detail = joinedDetails(_places(_rows->url(index)), row.detail);
+    row.accessibleDescription = spokenDescription(
+        row, spokenKind(entry), isKnown ? known->second.details.tagNames : std::vector<std::string>());
+    return row;
+}
+
+void DocumentRowSource::complete(ui::ListRow& row, const RowDetails& details) const
+{
+    if (details.name && !details.name->empty())
+        row.title = displayName(*details.name);
+    row.detail = details.text;
+    if (row.download == ui::DownloadState::Present)
+        row.download = details.download;
+    if (_tagColors && !details.tagNames.empty())
+        row.tagColors = _tagColors(details.tagNames);
+}
+
+void DocumentRowSource::followDownloads()
+{
+    _onDownloads = services().notificationCenter().observe(
+        Notification::DownloadsDidChange, [weak = weak_from_this()](const PropertyDictionary& userInfo) {
+            const auto self = weak.lock();
+            const auto url = userInfo.find("url");
+            if (self && self->_rows && url != userInfo.end())
+                self->tellIfVisible(self->_rows->idFor(*url->second.get<Url>()));
+        });
+}
+
+void DocumentRowSource::showDownload(ui::ListRow& row, std::size_t index) const
+{
+    const auto progress = services().cloudDocumentService().items().downloadProgress(_rows->url(index));
+    if (!progress)
+        return;
+    row.download = ui::DownloadState::Downloading;
+    if (progress->total && *progress->total > 0)
+        row.downloadProgress = static_cast<double>(progress->done) / static_cast<double>(*progress->total);
+}
+
+Image DocumentRowSource::iconFor(std::size_t index, const FolderEntry& entry) const
+{
+    if (const auto* extra = _rows->extraItem(index); extra && !extra->iconName.empty())
+        return Image::named(extra->iconName);
+    if (opensAsFolder(entry.kind))
+        return Image::named(folderIcon);
+    const auto& icon = documentIcon(entry.name);
+    // A link that its name gives no type of its own shows that it is one.
+    const bool isPlainLink = entry.kind == FolderEntryKind::Link && icon == plainDocumentIcon;
+    return Image::named(isPlainLink ? linkIcon : icon);
+}
+
+const std::string& DocumentRowSource::documentIcon(std::string_view name) const
+{
+    const std::string extension(nameExtension(name));
+    const auto known = _iconsByExtension.find(extension);
+    if (known != _iconsByExtension.end())
+        return known->second;
+    const auto& types = services().typeRegistry();
+    const auto type = types.typeForExtension(extension);
+    return _iconsByExtension.emplace(extension, type ? types.iconName(*type) : plainDocumentIcon)
+        .first->second;
+}
+
+const std::string& DocumentRowSource::documentKind(std::string_view name) const
+{
+    const std::string extension(nameExtension(name));
+    const auto known = _kindsByExtension.find(extension);
+    if (known != _kindsByExtension.end())
+        return known->second;
+    const auto& types = services().typeRegistry();
+    const auto type = types.typeForExtension(extension);
+    auto described = type ? types.description(*type).value_or(std::string()) : std::string();
+    return _kindsByExtension.emplace(extension, std::move(described)).first->second;
+}
+
+/// What kind of item a row stands for, to be said beside its name.
+std::string DocumentRowSource::spokenKind(const FolderEntry& entry) const
+{
+    switch (entry.kind) {
+    case FolderEntryKind::Library:
+        return localized("App library");
+    case FolderEntryKind::Folder:
+        return localized("Folder");
+    case FolderEntryKind::Link:
+        return {}; // the details say so
+    default:
+        return documentKind(entry.name);
+    }
+}
+
+void DocumentRowSource::visibleRowsDidChange()
+{
+    const auto list = _list.lock();
+    if (!list || !_rows)
+        return;
+    _loader->setWanted(visibleRowsThat([](const Known* known) { return !known || known->isStale; }));
+    forgetDetailsOutside(list->visibleRows());
+    fetchThumbnails();
+}
+
+std::vector<RowRequest> DocumentRowSource::visibleRowsThat(
+    const std::function<bool(const Known* known)>& lackSomething) const
+{
+    std::vector<RowRequest> requests;
+    const auto list = _list.lock();
+    const auto range = list && _rows ? list->visibleRows() : ui::RowRange();
+    for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {
+        const auto id = _rows->ids()[row];
+        const auto known = _known.find(id);
+        if (lackSomething(known == _known.end() ? nullptr : &known->second))
+            requests.push_back({id, _rows->url(row), _rows->entry(row).kind});
+    }
+    return requests;
+}
+
+void DocumentRowSource::fetchThumbnails()
+{
+    _thumbnails->setWanted(visibleRowsThat([](const Known* known) {
+        return known && known->details.modified && known->details.modified != known->thumbnailOf;
+    }));
+}
+
+void DocumentRowSource::thumbnailArrived(ui::RowId id, std::optional<Image> thumbnail)
+{
+    const auto known = _known.find(id);
+    if (known == _known.end())
+        return;
+    const bool isNews = thumbnail || known->second.thumbnail;
+    known->second.thumbnail = std::move(thumbnail);
+    known->second.thumbnailOf = known->second.details.modified;
+    if (isNews)
+        tellIfVisible(id);
+}
+
+void DocumentRowSource::invalidateDetails(const std::optional<std::vector<ui::RowId>>& rows)
+{
+    for (auto& [id, known] : _known)
+        known.isStale = known.isStale || !rows || known.details.isContainer;
+    if (!rows)
+        return _loader->cancelAll();
+    for (const auto id : *rows) {
+        if (const auto known = _known.find(id); known != _known.end())
+            known->second.isStale = true;
+        _loader->cancel(id);
+    }
+}
+
+void DocumentRowSource::detailsArrived(ui::RowId id, RowDetails details)
+{
+    auto& known = _known[id];
+    const bool isNews = known.isNew || !(known.details == details);
+    known.details = std::move(details);
+    known.isStale = known.isNew = false;
+    if (isNews)
+        tellIfVisible(id);
+    fetchThumbnails();
+}
+
+void DocumentRowSource::tellIfVisible(ui::RowId id) const
+{
+    const auto list = _list.lock();
+    if (!list)
+        return;
+    const auto range = list->visibleRows();
+    for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {
+        if (_rows->ids()[row] == id)
+            list->rowChanged(row);
+    }
+}
+
+void DocumentRowSource::forgetDetailsOutside(const ui::RowRange& range)
+{
+    if (_known.size() <= keptDetails)
+        return;
+    std::unordered_map<ui::RowId, Known> kept;
+    for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {
+        if (auto known = _known.extract(_rows->ids()[row]))
+            kept.insert(std::move(known));
+    }
+    _known = std::move(kept);
+}
+
+} // namespace platform::components

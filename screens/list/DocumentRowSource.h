@@ -1,0 +1,94 @@
+#pragma once
+
+#include "kit/ListViewDataSource.h"
+#include "platform/Color.h"
+#include "platform/NotificationCenter.h"
+#include "screens/list/DocumentRows.h"
+#include "screens/list/RowDetails.h"
+#include "screens/list/VisibleRowLoader.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <unordered_map>
+#include <vector>
+
+namespace platform::ui {
+class ListView;
+} // namespace platform::ui
+
+namespace platform::components {
+
+/// Makes the rows of a document list from what the listing knows, and completes them with details that are
+/// fetched while they are visible. Main thread only.
+class DocumentRowSource : public ui::ListViewDataSource,
+                          public std::enable_shared_from_this<DocumentRowSource> {
+public:
+    /// The dots for tags; called on the main thread for rows that are about to be seen.
+    using TagColors = std::function<std::vector<Color>(const std::vector<std::string>& names)>;
+
+    /// Details of this many rows are kept; beyond, those that are not visible go.
+    static constexpr std::size_t keptDetails = 600;
+
+    static std::shared_ptr<DocumentRowSource> create(const std::shared_ptr<ui::ListView>& list);
+    explicit DocumentRowSource(const std::shared_ptr<ui::ListView>& list);
+
+    const std::shared_ptr<const DocumentRows>& rows() const { return _rows; }
+    /// The list has to be told the difference by the caller.
+    void setRows(std::shared_ptr<const DocumentRows> rows) { _rows = std::move(rows); }
+    void setTagColors(TagColors tagColors) { _tagColors = std::move(tagColors); }
+
+    /// Where an item lies, said before its details; none at first. Called for rows that are about to be seen.
+    using Places = std::function<std::string(const Url& url)>;
+    void setPlaces(Places places) { _places = std::move(places); }
+
+    /// Fetches what is missing for the visible rows.
+    void visibleRowsDidChange();
+    /// Items may have changed, or with nothing all: known details stay on the screen until the next
+    /// `visibleRowsDidChange` has read them again. What folders hold may always have changed.
+    void invalidateDetails(const std::optional<std::vector<ui::RowId>>& rows = std::nullopt);
+
+    std::size_t numberOfRows(const ui::ListView& list) const override;
+    ui::ListRow rowAtIndex(const ui::ListView& list, std::size_t index) const override;
+    ui::RowId rowIdAtIndex(const ui::ListView& list, std::size_t index) const override;
+    std::optional<std::size_t> rowBeginningWith(
+        const ui::ListView& list, std::string_view text, std::size_t from) const override;
+
+private:
+    struct Known {
+        RowDetails details{};
+        bool isNew = true, isStale = false;
+        std::optional<Image> thumbnail{};
+        std::optional<Date> thumbnailOf{}; ///< the version that a thumbnail was looked for
+    };
+    using Loader = VisibleRowLoader<RowDetails>;
+    using ThumbnailLoader = VisibleRowLoader<std::optional<Image>>;
+
+    void detailsArrived(ui::RowId id, RowDetails details);
+    void thumbnailArrived(ui::RowId id, std::optional<Image> thumbnail);
+    /// Asked with what is known of a row; null: nothing.
+    std::vector<RowRequest> visibleRowsThat(
+        const std::function<bool(const Known* known)>& lackSomething) const;
+    void fetchThumbnails();
+    void tellIfVisible(ui::RowId id) const;
+    void followDownloads();
+    void showDownload(ui::ListRow& row, std::size_t index) const;
+    void forgetDetailsOutside(const ui::RowRange& range);
+    void complete(ui::ListRow& row, const RowDetails& details) const;
+    Image iconFor(std::size_t index, const FolderEntry& entry) const;
+    const std::string& documentIcon(std::string_view name) const;
+    const std::string& documentKind(std::string_view name) const;
+    std::string spokenKind(const FolderEntry& entry) const;
+
+    std::weak_ptr<ui::ListView> _list;
+    std::shared_ptr<const DocumentRows> _rows;
+    std::shared_ptr<Loader> _loader;
+    std::shared_ptr<ThumbnailLoader> _thumbnails;
+    Observation _onDownloads;
+    TagColors _tagColors;
+    Places _places;
+    std::unordered_map<ui::RowId, Known> _known;
+    mutable std::unordered_map<std::string, std::string> _iconsByExtension, _kindsByExtension;
+};
+
+} // namespace platform::components

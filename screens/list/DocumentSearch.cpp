@@ -1,0 +1,171 @@
+#include "screens/list/DocumentSearch.h"
+
+#include "kit/ListView.h"
+#include "platform/Localization.h"
+#include "platform/Services.h"
+#include "screens/FolderPlaces.h"
+#include "screens/PlaceholderView.h"
+#include "screens/list/DocumentRowSource.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+std::shared_ptr<const DocumentRows> rowsOf(const NameSearchResults& results)
+{
+    FolderSnapshot::Builder builder(rootFolder().value_or(Url::fileURL("/")));
+    for (const auto& item : results.items)
+        builder.append(FolderSnapshot::ExtraItem{item.url, item.url.lastPathComponent(), item.kind, {}});
+    return DocumentRows::make(builder.finish(ListingStage::Complete));
+}
+
+} // namespace
+
+std::shared_ptr<DocumentSearch> DocumentSearch::create(Handlers handlers)
+{
+    const auto search = std::make_shared<DocumentSearch>(std::move(handlers));
+    search->build();
+    return search;
+}
+
+DocumentSearch::DocumentSearch(Handlers handlers)
+    : _handlers(std::move(handlers))
+{
+}
+
+void DocumentSearch::build()
+{
+    _results = std::make_shared<ui::ListView>();
+    _results->setAccessibility({.label = localized("Search"), .hint = {}});
+    _results->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
+    _source = DocumentRowSource::create(_results);
+    _source->setPlaces(placeText);
+    _results->setDataSource(_source);
+    _results->setListDelegate(
+        std::shared_ptr<ui::ListViewDelegate>(shared_from_this(), static_cast<ui::ListViewDelegate*>(this)));
+    _placeholder = PlaceholderView::create();
+    _placeholder->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
+    showState({});
+    _presentation = std::make_shared<ui::SearchPresentation>();
+    _presentation->setPlaceholder(localized("Search"));
+    const auto& view = _presentation->view();
+    for (const std::shared_ptr<ui::View>& part :
+        {std::shared_ptr<ui::View>(_results), std::shared_ptr<ui::View>(_placeholder)}) {
+        part->setFrame(view->bounds());
+        view->addSubview(part);
+    }
+    _presentation->setDelegate(std::shared_ptr<ui::SearchPresentationDelegate>(
+        shared_from_this(), static_cast<ui::SearchPresentationDelegate*>(this)));
+    // It learns the names before the first letter is typed.
+    begin();
+}
+
+void DocumentSearch::begin()
+{
+    _session = services().nameSearch().begin(
+        searchableFolders(), [weak = weak_from_this()](const NameSearchResults& results) {
+            if (const auto self = weak.lock())
+                self->resultsArrived(results);
+        });
+}
+
+void DocumentSearch::searchQueryDidChange(ui::SearchPresentation&)
+{
+    _ahead = {};
+    if (!_session)
+        begin();
+    _session->setQuery(_presentation->query());
+}
+
+void DocumentSearch::searchResultsWanted(ui::SearchPresentation&)
+{
+    ++_ahead.down;
+    catchUp();
+}
+
+void DocumentSearch::searchResultChosen(ui::SearchPresentation&)
+{
+    _ahead.opens = true;
+    catchUp();
+}
+
+void DocumentSearch::catchUp()
+{
+    const auto rows = _source->rows();
+    const bool isAsked = _ahead.opens || _ahead.down > 0;
+    if (!isAsked || !_isComplete || !rows || rows->count() == 0 || _shownQuery != _presentation->query())
+        return;
+    const auto ahead = std::exchange(_ahead, {});
+    const auto row = std::min(std::max<std::size_t>(ahead.down, 1), rows->count()) - 1;
+    if (ahead.opens)
+        rowActivated(*_results, row);
+    else
+        _results->focusRow(row);
+}
+
+void DocumentSearch::searchDidDisappear(ui::SearchPresentation&)
+{
+    _session.reset();
+}
+
+void DocumentSearch::resultsArrived(const NameSearchResults& results)
+{
+    const auto before = _source->rows();
+    auto rows = rowsOf(results);
+    const bool isSameQuery = before && results.query == _shownQuery;
+    _shownQuery = results.query;
+    const auto changes = isSameQuery ? DocumentRows::changes(*before, *rows) : ui::ListChanges();
+    _source->setRows(std::move(rows));
+    if (isSameQuery)
+        _results->apply(changes);
+    else
+        _results->reloadAll();
+    _source->visibleRowsDidChange();
+    showState(results);
+    _isComplete = results.isComplete;
+    catchUp();
+}
+
+void DocumentSearch::showState(const NameSearchResults& results)
+{
+    if (results.query.empty())
+        _placeholder->setContent({.iconName = "edit-find-symbolic",
+            .title = localized("Search the whole drive"),
+            .message = localized("Find folders and documents by their names.")});
+    else if (results.isComplete)
+        _placeholder->setContent({.iconName = "edit-find-symbolic",
+            .title = localized("Nothing found"),
+            .message = localized("No item of the drive has a name with this text.")});
+    else
+        _placeholder->setContent({.message = localized("Searching…"), .isBusy = true});
+    _placeholder->setHidden(results.total > 0);
+}
+
+void DocumentSearch::rowActivated(ui::ListView&, std::size_t index)
+{
+    const auto& rows = _source->rows();
+    if (rows && index < rows->count())
+        _handlers.chosen(rows->url(index), rows->entry(index).kind);
+}
+
+ui::Menu DocumentSearch::menuForRow(ui::ListView&, std::size_t index)
+{
+    const auto& rows = _source->rows();
+    if (!rows || index >= rows->count())
+        return {};
+    auto show = [weak = weak_from_this(), url = rows->url(index)] {
+        if (const auto self = weak.lock())
+            self->_handlers.showInFolder(url);
+    };
+    return {{.title = localized("Show in Its Folder"), .handler = std::move(show), .image = {}}};
+}
+
+void DocumentSearch::visibleRowsDidChange(ui::ListView&, ui::RowRange)
+{
+    _source->visibleRowsDidChange();
+}
+
+} // namespace platform::components

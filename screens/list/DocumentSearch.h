@@ -1,0 +1,75 @@
+#pragma once
+
+#include "kit/ListViewDelegate.h"
+#include "kit/SearchPresentation.h"
+#include "platform/NameSearch.h"
+#include "platform/Url.h"
+#include "screens/list/DocumentRows.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+
+namespace platform::ui {
+class ListView;
+} // namespace platform::ui
+
+namespace platform::components {
+
+class DocumentRowSource;
+class PlaceholderView;
+
+/// The search over a folder list: the items of the whole drive whose names hold what is typed, each with its
+/// place. Main thread only.
+class DocumentSearch : public std::enable_shared_from_this<DocumentSearch>,
+                       private ui::SearchPresentationDelegate,
+                       private ui::ListViewDelegate {
+public:
+    /// What the user does with a result.
+    struct Handlers {
+        std::function<void(const Url& url, FolderEntryKind kind)> chosen;
+        std::function<void(const Url& url)> showInFolder;
+    };
+
+    static std::shared_ptr<DocumentSearch> create(Handlers handlers);
+    explicit DocumentSearch(Handlers handlers);
+
+    /// The screen to present; it shows the results.
+    const std::shared_ptr<ui::SearchPresentation>& presentation() const { return _presentation; }
+    const std::shared_ptr<ui::ListView>& results() const { return _results; }
+    const std::shared_ptr<PlaceholderView>& placeholder() const { return _placeholder; }
+    const std::shared_ptr<DocumentRowSource>& rowSource() const { return _source; }
+
+private:
+    void build();
+    void searchQueryDidChange(ui::SearchPresentation& search) override;
+    void searchResultsWanted(ui::SearchPresentation& search) override;
+    void searchResultChosen(ui::SearchPresentation& search) override;
+    void searchDidDisappear(ui::SearchPresentation& search) override;
+    void begin();
+    void rowActivated(ui::ListView& list, std::size_t index) override;
+    void visibleRowsDidChange(ui::ListView& list, ui::RowRange range) override;
+    ui::Menu menuForRow(ui::ListView& list, std::size_t index) override;
+    void resultsArrived(const NameSearchResults& results);
+    void showState(const NameSearchResults& results);
+    /// Does what was typed ahead of the results, once they are there.
+    void catchUp();
+
+    /// What keys in the field asked of the results.
+    struct Ahead {
+        std::size_t down = 0; ///< how often
+        bool opens = false;
+    };
+
+    Handlers _handlers;
+    std::shared_ptr<ui::SearchPresentation> _presentation;
+    std::shared_ptr<ui::ListView> _results;
+    std::shared_ptr<PlaceholderView> _placeholder;
+    std::shared_ptr<DocumentRowSource> _source;
+    std::shared_ptr<NameSearchSession> _session;
+    std::string _shownQuery; ///< of the rows that are shown
+    bool _isComplete = false; ///< there will be no other rows for it
+    Ahead _ahead;
+};
+
+} // namespace platform::components

@@ -1,0 +1,91 @@
+#include "screens/list/RowDetails.h"
+
+#include "platform/CloudDocumentService.h"
+#include "platform/FileCoordinator.h"
+#include "platform/Formatters.h"
+#include "platform/Localization.h"
+#include "platform/Services.h"
+#include "screens/DetailText.h"
+
+#include <filesystem>
+#include <system_error>
+
+namespace platform::components {
+
+namespace {
+
+constexpr AttributeKey detailKeys[] = {AttributeKey::LocalizedName, AttributeKey::ContentModificationDate,
+    AttributeKey::FileSize, AttributeKey::IsShared, AttributeKey::DownloadingStatus};
+
+PromisedItems& promisedItems()
+{
+    return services().cloudDocumentService().promisedItems();
+}
+
+/// Whether a name of a folder stands for an item that its list shows.
+bool isListed(const std::filesystem::path& path)
+{
+    const auto name = path.filename();
+    return !name.native().starts_with('.') || promisedItems().isItemPromise(Url::fileURL(path.native()));
+}
+
+std::optional<std::int64_t> numberOfItems(const Url& folder)
+{
+    std::error_code error;
+    std::filesystem::directory_iterator entry(folder.path(), error);
+    std::int64_t count = 0;
+    for (; !error && entry != std::filesystem::directory_iterator(); entry.increment(error))
+        count += isListed(entry->path()) ? 1 : 0;
+    return error ? std::nullopt : std::optional(count);
+}
+
+bool isContainer(FolderEntryKind kind)
+{
+    return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
+}
+
+std::string sizeText(const Url& url, FolderEntryKind kind, const AttributeMap& values)
+{
+    if (kind == FolderEntryKind::Link)
+        return localized("Link");
+    if (isContainer(kind)) {
+        const auto count = numberOfItems(url);
+        return count ? localizedPlural(".DICT.ITEMS.%d", {*count}) : std::string();
+    }
+    const auto* size = values.get<std::uint64_t>(AttributeKey::FileSize);
+    return size ? services().formatters().byteCount(*size, ByteCountStyle::File, ByteCountUnit::Included)
+                : std::string();
+}
+
+void describe(RowDetails& details, const Url& url, FolderEntryKind kind, const AttributeMap& values)
+{
+    details.name = values.optional<std::string>(AttributeKey::LocalizedName);
+    if (const auto* date = values.get<Date>(AttributeKey::ContentModificationDate))
+        details.text = services().formatters().date(*date, DateStyle::Medium, DateStyle::None);
+    details.text = joinedDetails(details.text, sizeText(url, kind, values));
+    if (values.flag(AttributeKey::IsShared))
+        details.text = joinedDetails(details.text, localized("Shared"));
+    const auto* status = values.get<DownloadingStatus>(AttributeKey::DownloadingStatus);
+    if (status && *status == DownloadingStatus::NotDownloaded)
+        details.download = ui::DownloadState::InCloud;
+    if (kind == FolderEntryKind::Document && details.download == ui::DownloadState::Present)
+        details.modified = values.optional<Date>(AttributeKey::ContentModificationDate);
+}
+
+} // namespace
+
+RowDetails readRowDetails(const Url& url, FolderEntryKind kind)
+{
+    RowDetails details;
+    details.isContainer = isContainer(kind);
+    services().fileCoordinator().coordinateReading(
+        url, ReadingOptions::ImmediatelyAvailableMetadataOnly, [&](const Url& location) {
+            if (const auto values = promisedItems().promisedItemResourceValues(location, detailKeys))
+                describe(details, location, kind, *values);
+            if (auto names = promisedItems().tagNames(location))
+                details.tagNames = std::move(*names.value);
+        });
+    return details;
+}
+
+} // namespace platform::components

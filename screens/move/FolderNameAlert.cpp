@@ -1,0 +1,58 @@
+#include "screens/move/FolderNameAlert.h"
+
+#include "kit/AlertController.h"
+#include "kit/TextField.h"
+#include "platform/Localization.h"
+
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+constexpr std::size_t longestName = 255; ///< bytes, of the file systems in use
+
+std::string trimmed(const std::string& text)
+{
+    const auto first = text.find_first_not_of(" \t");
+    return first == std::string::npos ? std::string()
+                                      : text.substr(first, text.find_last_not_of(" \t") - first + 1);
+}
+
+bool canBeName(const std::string& name)
+{
+    return !name.empty() && name.front() != '.' && name.size() <= longestName
+        && name.find_first_of("/:") == std::string::npos;
+}
+
+} // namespace
+
+std::shared_ptr<ui::AlertController> makeFolderNameAlert(std::function<void(const std::string&)> chosen)
+{
+    const auto alert =
+        std::make_shared<ui::AlertController>(localized("New Folder"), std::string(), ui::AlertStyle::Alert);
+    const std::weak_ptr<ui::AlertController> weak = alert;
+    alert->addTextField([](ui::TextField& field) {
+        field.setPlaceholder(localized("Name"));
+        field.setInputTraits(
+            {.returnKey = ui::ReturnKey::Done, .clearButton = ui::ClearButton::WhileEditing});
+    });
+    alert->addAction(std::make_shared<ui::AlertAction>(localized("Cancel"), ui::AlertActionStyle::Cancel));
+    const auto create = std::make_shared<ui::AlertAction>(
+        localized("Create"), ui::AlertActionStyle::Default, [weak, chosen = std::move(chosen)](const auto&) {
+            if (const auto asked = weak.lock())
+                chosen(trimmed(asked->textFields().front()->text()));
+        });
+    create->setEnabled(false);
+    alert->addAction(create);
+    alert->setPreferredAction(create);
+    alert->textFields().front()->setOnEditingChanged([weak, action = std::weak_ptr(create)] {
+        const auto asked = weak.lock();
+        const auto pressed = action.lock();
+        if (asked && pressed)
+            pressed->setEnabled(canBeName(trimmed(asked->textFields().front()->text())));
+    });
+    return alert;
+}
+
+} // namespace platform::components

@@ -1,0 +1,115 @@
+#include "screens/move/MoveTargetPicker.h"
+
+#include "screens/FolderPlaces.h"
+#include "screens/move/MoveTargetScreen.h"
+#include "screens/move/RecentMoveTargets.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace platform::components {
+
+std::shared_ptr<MoveTargetPicker> MoveTargetPicker::initWithItemsScope(
+    std::vector<Url> items, MoveTargetScope scope)
+{
+    const auto picker = std::make_shared<MoveTargetPicker>(std::move(items), scope);
+    const auto start = picker->_itemsToMove.empty()
+        ? rootFolder()
+        : std::optional(picker->_itemsToMove.front().deletingLastPathComponent());
+    if (start)
+        picker->show(*start);
+    return picker;
+}
+
+MoveTargetPicker::MoveTargetPicker(std::vector<Url> items, MoveTargetScope scope)
+    : _itemsToMove(std::move(items))
+    , _scope(scope)
+{
+    setPresentationStyle(ui::PresentationStyle::OverCurrentContext);
+    setToolbarHidden(false);
+}
+
+std::shared_ptr<MoveTargetPicker> MoveTargetPicker::self()
+{
+    return std::static_pointer_cast<MoveTargetPicker>(shared_from_this());
+}
+
+std::shared_ptr<MoveTargetScreen> MoveTargetPicker::makeScreen(const Url& folder)
+{
+    return std::make_shared<MoveTargetScreen>(self(), folder);
+}
+
+std::vector<Url> MoveTargetPicker::wayTo(const Url& folder) const
+{
+    auto way = foldersDownTo(folder);
+    if (_scope == MoveTargetScope::AllContainers || _itemsToMove.empty() || way.empty())
+        return way;
+    const auto own = foldersDownTo(_itemsToMove.front().deletingLastPathComponent());
+    const bool isInLibrary = own.size() > 1 && !own[1].isWithin(own[0]);
+    if (!isInLibrary)
+        return folder.isWithin(way.front()) ? way : std::vector<Url>();
+    if (!folder.isWithin(own[1]))
+        return {};
+    way.erase(way.begin());
+    return way;
+}
+
+bool MoveTargetPicker::offers(const Url& folder) const
+{
+    return !wayTo(folder).empty();
+}
+
+bool MoveTargetPicker::isToBeMoved(const Url& folder) const
+{
+    return std::any_of(_itemsToMove.begin(), _itemsToMove.end(),
+        [&folder](const Url& item) { return folder.isWithin(item); });
+}
+
+bool MoveTargetPicker::canChoose(const Url& folder) const
+{
+    return !_itemsToMove.empty() && !isToBeMoved(folder)
+        && std::any_of(_itemsToMove.begin(), _itemsToMove.end(),
+            [&folder](const Url& item) { return !(item.deletingLastPathComponent() == folder); });
+}
+
+void MoveTargetPicker::enter(const Url& folder)
+{
+    if (!isToBeMoved(folder))
+        pushViewController(makeScreen(folder), true);
+}
+
+void MoveTargetPicker::show(const Url& folder)
+{
+    std::vector<std::shared_ptr<ui::ViewController>> screens;
+    for (const auto& step : wayTo(folder))
+        screens.push_back(makeScreen(step));
+    if (!screens.empty())
+        setViewControllers(std::move(screens), isViewLoaded());
+}
+
+void MoveTargetPicker::choose(const Url& folder)
+{
+    if (_hasEnded || !canChoose(folder))
+        return;
+    _hasEnded = true;
+    RecentMoveTargets::remember(folder);
+    if (const auto told = _delegate.lock())
+        told->documentTargetSelectionControllerDidSelectItemAtURL(self(), folder);
+}
+
+void MoveTargetPicker::cancel()
+{
+    if (std::exchange(_hasEnded, true))
+        return;
+    dismissViewController(true, [picker = self()] {
+        if (const auto told = picker->_delegate.lock())
+            told->documentTargetSelectionControllerWasCancelled(picker);
+    });
+}
+
+void MoveTargetPicker::userCancelled()
+{
+    cancel();
+}
+
+} // namespace platform::components

@@ -1,0 +1,236 @@
+#include "screens/move/MoveTargetScreen.h"
+
+#include "kit/AlertController.h"
+#include "kit/ListView.h"
+#include "kit/NavigationItem.h"
+#include "platform/FileCoordinator.h"
+#include "platform/FileSystem.h"
+#include "platform/Localization.h"
+#include "platform/Services.h"
+#include "screens/ErrorWords.h"
+#include "screens/FolderPlaces.h"
+#include "screens/PlaceholderView.h"
+#include "screens/move/FolderNameAlert.h"
+#include "screens/move/MoveTargetPicker.h"
+#include "screens/move/RecentMoveTargets.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+/// Beyond this the exact difference of two states would cost a frame.
+constexpr std::size_t differenceLimit = 2000;
+
+void fill(ui::View& parent, const std::shared_ptr<ui::View>& view)
+{
+    view->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
+    view->setFrame(parent.bounds());
+    parent.addSubview(view);
+}
+
+} // namespace
+
+MoveTargetScreen::MoveTargetScreen(std::weak_ptr<MoveTargetPicker> picker, Url folder)
+    : _picker(std::move(picker))
+    , _folder(std::move(folder))
+    , _queue(services().dispatch().makeOperationQueue("move destinations", QualityOfService::UserInitiated))
+{
+    setTitle(folderTitle(_folder));
+}
+
+MoveTargetScreen::~MoveTargetScreen() = default;
+
+std::shared_ptr<MoveTargetScreen> MoveTargetScreen::self()
+{
+    return std::static_pointer_cast<MoveTargetScreen>(shared_from_this());
+}
+
+void MoveTargetScreen::loadView()
+{
+    const auto view = std::make_shared<ui::View>();
+    _listView = std::make_shared<ui::ListView>();
+    _listView->setAccessibility({.label = title(), .hint = {}});
+    _placeholder = PlaceholderView::create();
+    _placeholder->setHidden(true);
+    fill(*view, _listView);
+    fill(*view, _placeholder);
+    setView(view);
+}
+
+void MoveTargetScreen::viewDidLoad()
+{
+    makeBars();
+    const auto picker = _picker.lock();
+    const bool showsLibraries = picker && picker->scope() == MoveTargetScope::AllContainers;
+    _rows = std::make_shared<MoveTargetRows>(
+        showsLibraries ? MoveTargetRows::Libraries::Shown : MoveTargetRows::Libraries::Hidden,
+        [weak = _picker](const Url& folder) {
+            const auto picking = weak.lock();
+            return picking && picking->isToBeMoved(folder);
+        });
+    _listView->setDataSource(_rows);
+    _listView->setListDelegate(
+        std::shared_ptr<ui::ListViewDelegate>(self(), static_cast<ui::ListViewDelegate*>(this)));
+    _listing = services().folderLister().list(_folder,
+        showsLibraries ? extraItemsOf(_folder) : std::vector<FolderSnapshot::ExtraItem>(),
+        FolderGrouping::FoldersFirst,
+        [weak = std::weak_ptr(self())](const std::shared_ptr<const FolderSnapshot>& snapshot) {
+            if (const auto screen = weak.lock())
+                screen->snapshotArrived(snapshot);
+        });
+    findRecents();
+}
+
+void MoveTargetScreen::makeBars()
+{
+    const auto picker = _picker.lock();
+    if (!picker)
+        return;
+    const auto count = static_cast<std::int64_t>(picker->itemsToMove().size());
+    navigationItem().setSubtitle(localizedPlural(".DICT.MOVE_ITEMS.%d", {count}));
+    navigationItem().setRightItem(
+        std::make_shared<ui::BarButtonItem>(ui::SystemItem::Cancel, [weak = _picker](const auto&) {
+            if (const auto picking = weak.lock())
+                picking->cancel();
+        }));
+    const auto newFolder = std::make_shared<ui::BarButtonItem>(
+        localized("New Folder"), [weak = std::weak_ptr(self())](const auto&) {
+            if (const auto screen = weak.lock())
+                screen->askForNewFolder();
+        });
+    _moveButton = std::make_shared<ui::BarButtonItem>(
+        localized("Move Here"), [weak = _picker, folder = _folder](const auto&) {
+            if (const auto picking = weak.lock())
+                picking->choose(folder);
+        });
+    _moveButton->setEnabled(picker->canChoose(_folder));
+    setToolbarItems(
+        {newFolder, std::make_shared<ui::BarButtonItem>(ui::SystemItem::FlexibleSpace), _moveButton});
+}
+
+bool MoveTargetScreen::backRequested()
+{
+    // Cancel stands on every screen of the picker; going back is another thing below the first one.
+    const auto picker = _picker.lock();
+    if (!picker || picker->viewControllers().front() != shared_from_this())
+        return false;
+    return ui::ViewController::backRequested();
+}
+
+void MoveTargetScreen::snapshotArrived(const std::shared_ptr<const FolderSnapshot>& snapshot)
+{
+    const auto before = _rows->ids();
+    _rows->setSnapshot(snapshot);
+    const auto after = _rows->ids();
+    if (std::max(before.size(), after.size()) <= differenceLimit)
+        _listView->apply(ui::ListChanges::between(before, after));
+    else
+        _listView->reloadAll();
+    const auto picker = _picker.lock();
+    const bool hasFailed = snapshot->stage() == ListingStage::Failed;
+    _moveButton->setEnabled(!hasFailed && picker && picker->canChoose(_folder));
+    showState(hasFailed ? snapshot->error() : std::nullopt);
+}
+
+void MoveTargetScreen::showState(const std::optional<Error>& error)
+{
+    _placeholder->setHidden(!_rows->ids().empty());
+    if (error)
+        _placeholder->setContent({.iconName = "dialog-warning-symbolic",
+            .title = localized("This folder cannot be shown"),
+            .message = errorWords(*error)});
+    else
+        _placeholder->setContent({.iconName = "folder-open-symbolic",
+            .title = localized("No folders here"),
+            .message = _moveButton->isEnabled()
+                ? localized("Move the items into this folder, or make a new folder for them.")
+                : localized("Make a new folder for the items, or go back to another one.")});
+}
+
+void MoveTargetScreen::findRecents()
+{
+    const auto picker = _picker.lock();
+    if (!picker || picker->topViewController() != shared_from_this())
+        return;
+    std::vector<Url> candidates;
+    for (const auto& folder : RecentMoveTargets::folders()) {
+        if (picker->offers(folder) && picker->canChoose(folder))
+            candidates.push_back(folder);
+    }
+    const auto main = services().dispatch().mainQueue();
+    _queue->addOperation([weak = std::weak_ptr(self()), candidates = std::move(candidates), main] {
+        std::vector<Url> present;
+        for (const auto& folder : candidates) {
+            if (services().fileSystem().typeOfItem(folder.path()) == FileType::Directory
+                && present.size() < shownRecents)
+                present.push_back(folder);
+        }
+        main->async([weak, present = std::move(present)] {
+            if (const auto screen = weak.lock(); screen && !present.empty())
+                screen->showRecents(present);
+        });
+    });
+}
+
+void MoveTargetScreen::showRecents(std::vector<Url> recents)
+{
+    _rows->setRecents(std::move(recents));
+    _listView->reloadAll();
+    _placeholder->setHidden(true);
+}
+
+void MoveTargetScreen::rowActivated(ui::ListView&, std::size_t index)
+{
+    const auto picker = _picker.lock();
+    const auto folder = _rows->destination(index);
+    if (!picker || !folder)
+        return;
+    if (_rows->isRecent(index))
+        picker->show(*folder);
+    else
+        picker->enter(*folder);
+}
+
+void MoveTargetScreen::askForNewFolder()
+{
+    const auto alert = makeFolderNameAlert([weak = std::weak_ptr(self())](const std::string& name) {
+        if (const auto screen = weak.lock())
+            screen->makeFolder(name);
+    });
+    presentViewController(alert, true);
+}
+
+void MoveTargetScreen::makeFolder(const std::string& name)
+{
+    const auto made = _folder.appendingPathComponent(name, PathKind::Directory);
+    const auto main = services().dispatch().mainQueue();
+    _queue->addOperation([weak = std::weak_ptr(self()), made, main] {
+        std::optional<Error> failed;
+        const auto refused = services().fileCoordinator().coordinateWriting(
+            made, WritingOptions::None, [&failed](const Url& location) {
+                failed = services().fileSystem().createFolder(location.path());
+            });
+        main->async([weak, made, error = refused ? refused : failed] {
+            if (const auto screen = weak.lock())
+                screen->folderWasMade(made, error);
+        });
+    });
+}
+
+void MoveTargetScreen::folderWasMade(const Url& made, const std::optional<Error>& error)
+{
+    const auto picker = _picker.lock();
+    if (!error && picker && picker->topViewController() == shared_from_this())
+        picker->enter(made);
+    if (!error)
+        return;
+    const auto alert = std::make_shared<ui::AlertController>(
+        localized("The folder cannot be made"), errorWords(*error), ui::AlertStyle::Alert);
+    alert->addAction(std::make_shared<ui::AlertAction>(localized("OK"), ui::AlertActionStyle::Cancel));
+    presentViewController(alert, true);
+}
+
+} // namespace platform::components

@@ -1,0 +1,66 @@
+#pragma once
+
+#include "kit/ListViewDelegate.h"
+#include "kit/ViewController.h"
+#include "platform/Dispatch.h"
+#include "platform/FolderLister.h"
+#include "screens/move/MoveTargetRows.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace platform::ui {
+class ListView;
+} // namespace platform::ui
+
+namespace platform::components {
+
+class MoveTargetPicker;
+class PlaceholderView;
+
+/// One folder of a MoveTargetPicker: its folders, and while the picker starts the recent destinations above
+/// them. Main thread only.
+class MoveTargetScreen : public ui::ViewController, private ui::ListViewDelegate {
+public:
+    /// The destinations shown as recent, at most.
+    static constexpr std::size_t shownRecents = 3;
+
+    MoveTargetScreen(std::weak_ptr<MoveTargetPicker> picker, Url folder);
+    ~MoveTargetScreen() override;
+
+    const Url& folder() const { return _folder; }
+    const std::shared_ptr<ui::ListView>& listView() const { return _listView; }
+    const std::shared_ptr<PlaceholderView>& placeholder() const { return _placeholder; }
+
+    /// Asks for a name, and makes and enters the folder with it.
+    void askForNewFolder();
+
+    void loadView() override;
+    void viewDidLoad() override;
+    bool backRequested() override;
+
+private:
+    void rowActivated(ui::ListView& list, std::size_t index) override;
+
+    std::shared_ptr<MoveTargetScreen> self();
+    void makeBars();
+    void snapshotArrived(const std::shared_ptr<const FolderSnapshot>& snapshot);
+    void showState(const std::optional<Error>& error);
+    void findRecents();
+    void showRecents(std::vector<Url> recents);
+    void makeFolder(const std::string& name);
+    void folderWasMade(const Url& made, const std::optional<Error>& error);
+
+    std::weak_ptr<MoveTargetPicker> _picker;
+    Url _folder;
+    std::shared_ptr<ui::ListView> _listView;
+    std::shared_ptr<PlaceholderView> _placeholder;
+    std::shared_ptr<ui::BarButtonItem> _moveButton;
+    std::shared_ptr<MoveTargetRows> _rows;
+    std::shared_ptr<FolderListing> _listing;
+    std::shared_ptr<OperationQueue> _queue;
+};
+
+} // namespace platform::components

@@ -1,0 +1,340 @@
+// Changing the document that is shown, and what becomes of the edits.
+
+#include "kit/NavigationController.h"
+#include "platform/Localization.h"
+#include "platform/Services.h"
+#include "screens/AlertParts.h"
+#include "screens/DisplayName.h"
+#include "screens/ErrorWords.h"
+#include "screens/preview/PreviewContent.h"
+#include "screens/preview/PreviewController.h"
+#include "screens/preview/PreviewEditor.h"
+#include "screens/preview/PreviewFieldBar.h"
+#include "screens/preview/PreviewLoader.h"
+#include "screens/preview/PreviewPagesView.h"
+#include "screens/preview/PreviewScreenView.h"
+#include "screens/preview/PreviewToolbar.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+using Editing = std::shared_ptr<PreviewEditing>;
+
+std::string whyNotChanged(const Error& error)
+{
+    const bool isDamaged =
+        error.domain() == errorDomain::pages && error.code() == static_cast<int>(PagesErrorCode::Damaged);
+    if (isDamaged)
+        return localized("The document is damaged. It can be read, but not changed.");
+    if (error.domain() == errorDomain::system && error.code() == EFBIG)
+        return localized("The document is too large to be changed here.");
+    return errorWords(error);
+}
+
+std::string nameOf(const Url& url)
+{
+    return displayName(url.lastPathComponent());
+}
+
+} // namespace
+
+bool PreviewController::canEdit() const
+{
+    const auto delegate = _delegate.lock();
+    const bool isAllowed = _content && _content->kind == PreviewContent::Kind::Pages
+        && (_content->rights.canFillForms || _content->rights.canMark);
+    return isAllowed && _item && delegate && delegate->previewControllerCanEditItem(*this, *_item);
+}
+
+bool PreviewController::shouldSave(const Url& item)
+{
+    const auto delegate = _delegate.lock();
+    return delegate && delegate->previewControllerShouldSaveEditedItem(*this, item);
+}
+
+void PreviewController::beginEditing()
+{
+    if (_editor || _isEditingWanted || !canEdit())
+        return;
+    _isEditingWanted = true;
+    _lastNavigation = navigationController();
+    PreviewEditing::begin(
+        *_item, [weak = std::weak_ptr(self()), generation = _generation](const auto& begun) {
+            const auto screen = weak.lock();
+            if (!screen || !screen->_isEditingWanted)
+                return;
+            screen->_isEditingWanted = false;
+            if (screen->_generation == generation)
+                screen->editingBegan(begun);
+        });
+}
+
+void PreviewController::editingBegan(const Result<Editing>& begun)
+{
+    const auto pages = std::dynamic_pointer_cast<PreviewPagesView>(_previewView);
+    if (!pages || !_item)
+        return;
+    if (!begun)
+        return alert(
+            messageAlert(localized("“%@” cannot be changed", {nameOf(*_item)}), whyNotChanged(*begun.error)));
+    const auto& editing = *begun.value;
+    // A reading that is under way would put the document back that is not being changed.
+    cancelLoad();
+    const auto& shown = _savedVersion ? _savedVersion : _content->version;
+    if (shown == editing->versionRead())
+        pages->continueWith(editing->pages());
+    else
+        pages->setDocument(editing->pages(), editing->pages()->pageSize(0));
+    const std::weak_ptr<PreviewController> weak = self();
+    _editor = PreviewEditor::create(editing, pages,
+        {.present =
+                [weak](const auto& presented) {
+                    if (const auto screen = weak.lock())
+                        screen->alert(presented);
+                },
+            .layoutDidChange =
+                [weak] {
+                    if (const auto screen = weak.lock())
+                        screen->showEditBars();
+                },
+            .done = calling(&PreviewController::endEditing)});
+    _edited.push_back(editing);
+    auto& center = services().notificationCenter();
+    const auto observe = [&](Notification notification, void (PreviewController::*act)()) {
+        return center.observe(notification, [call = calling(act)](const auto&) { call(); });
+    };
+    _observations.clear();
+    _observations.push_back(
+        observe(Notification::ApplicationWillResignActive, &PreviewController::keepEdits));
+    _observations.push_back(observe(Notification::ApplicationWillTerminate, &PreviewController::programEnds));
+    showEditBars();
+    pages->takeFocus();
+}
+
+void PreviewController::showEditBars()
+{
+    if (!_screen)
+        return;
+    if (_editor)
+        _screen->setEditBars(_editor->bar(), _editor->fieldBar());
+    else
+        _screen->setEditBars(nullptr, nullptr);
+    _screen->setNote(_editor ? _editor->hint() : _content ? _content->note : std::string());
+    connectPreview();
+}
+
+/// Notes can be read also where nothing can be changed.
+void PreviewController::connectPages()
+{
+    const auto pages = std::dynamic_pointer_cast<PreviewPagesView>(_previewView);
+    if (!pages || _editor)
+        return;
+    const std::weak_ptr<PreviewController> weak = self();
+    pages->setOnTap([weak](const PreviewPagesView::PagePlace& place) {
+        const auto screen = weak.lock();
+        const auto shown =
+            screen ? std::dynamic_pointer_cast<PreviewPagesView>(screen->_previewView) : nullptr;
+        if (!shown)
+            return;
+        shown->findMark(place, [weak](const std::optional<PageMark>& mark) {
+            const auto reader = weak.lock();
+            if (reader && mark && !mark->text.empty())
+                reader->alert(makeNoteAlert(*mark));
+        });
+    });
+}
+
+void PreviewController::removeEditor()
+{
+    _isEditingWanted = false;
+    if (!_editor)
+        return;
+    _editor->finishWriting();
+    _editor = nullptr;
+    showEditBars();
+}
+
+void PreviewController::endEditing()
+{
+    if (!_editor)
+        return;
+    _editor->finishWriting();
+    const auto editing = _editor->editing();
+    removeEditor();
+    keep(editing);
+    if (const auto pages = _previewView)
+        pages->takeFocus();
+}
+
+void PreviewController::keepEdits()
+{
+    if (!_editor)
+        return;
+    _editor->finishWriting();
+    if (shouldSave(_editor->editing()->item()))
+        keep(_editor->editing());
+}
+
+/// Leaves the document; `newItem` is what is shown next, perhaps the same document at another place.
+void PreviewController::leaveEditing(const std::optional<Url>& newItem)
+{
+    if (!_editor) {
+        _isEditingWanted = false;
+        return;
+    }
+    _editor->finishWriting();
+    const auto editing = _editor->editing();
+    removeEditor();
+    if (newItem)
+        editing->follow(*newItem);
+    keep(editing);
+}
+
+void PreviewController::keep(const Editing& editing)
+{
+    if (!editing->hasUnsavedEdits()) {
+        if (!_editor || _editor->editing() != editing)
+            std::erase(_edited, editing);
+        return;
+    }
+    if (!shouldSave(editing->item()))
+        return askForUnsaved(editing);
+    editing->save([weak = std::weak_ptr(self()), editing](const EditsKept& outcome) {
+        if (const auto screen = weak.lock())
+            screen->kept(editing, outcome);
+    });
+}
+
+void PreviewController::kept(const Editing& editing, const EditsKept& outcome)
+{
+    const bool isBeingEdited = _editor && _editor->editing() == editing;
+    const bool isShown = isBeingEdited || (!_editor && _item == outcome.place);
+    if (!isBeingEdited)
+        std::erase(_edited, editing);
+    switch (outcome.where) {
+    case EditsKept::Where::Document:
+        if (isShown)
+            _savedVersion = outcome.version;
+        return;
+    case EditsKept::Where::Copy: {
+        // The document holds what the other program wrote; there is nothing of ours to go on with.
+        const auto item = editing->item();
+        if (isBeingEdited)
+            removeEditor();
+        std::erase(_edited, editing);
+        _savedVersion.reset();
+        if (_item == item)
+            refreshCurrentPreviewItem();
+        return alert(messageAlert(localized("“%@” was changed by another program", {nameOf(item)}),
+            localized("Your changes are kept in a copy, “%@”.", {nameOf(outcome.place)})));
+    }
+    case EditsKept::Where::Nowhere:
+        return askAfterFailure(editing, outcome);
+    }
+}
+
+void PreviewController::askAfterFailure(const Editing& editing, const EditsKept& outcome)
+{
+    if (std::ranges::count(_edited, editing) == 0)
+        _edited.push_back(editing);
+    const std::weak_ptr<PreviewController> weak = self();
+    const auto question =
+        std::make_shared<ui::AlertController>(localized("“%@” could not be saved", {nameOf(editing->item())}),
+            outcome.error ? whyNotChanged(*outcome.error) : std::string(), ui::AlertStyle::Alert);
+    question->addAction(alertAction(localized("Try Again"), ui::AlertActionStyle::Default, [weak, editing] {
+        if (const auto screen = weak.lock())
+            screen->keep(editing);
+    }));
+    addCopyAndDiscard(*question, editing);
+    alert(question);
+}
+
+void PreviewController::askForUnsaved(const Editing& editing)
+{
+    const auto question = std::make_shared<ui::AlertController>(
+        localized("Your changes to “%@” are not saved", {nameOf(editing->item())}), std::string(),
+        ui::AlertStyle::Alert);
+    addCopyAndDiscard(*question, editing);
+    alert(question);
+}
+
+void PreviewController::addCopyAndDiscard(ui::AlertController& question, const Editing& editing)
+{
+    const std::weak_ptr<PreviewController> weak = self();
+    question.addAction(alertAction(localized("Keep a Copy"), ui::AlertActionStyle::Default, [weak, editing] {
+        editing->saveCopy([weak, editing](const EditsKept& outcome) {
+            if (const auto screen = weak.lock())
+                screen->keptCopy(editing, outcome);
+        });
+    }));
+    question.addAction(
+        alertAction(localized("Discard Changes"), ui::AlertActionStyle::Destructive, [weak, editing] {
+            editing->discard();
+            if (const auto screen = weak.lock())
+                screen->showOnDisk(editing);
+        }));
+}
+
+void PreviewController::keptCopy(const Editing& editing, const EditsKept& outcome)
+{
+    if (outcome.where == EditsKept::Where::Nowhere)
+        return askAfterFailure(editing, outcome);
+    showOnDisk(editing);
+    alert(messageAlert(
+        localized("Your changes are kept"), localized("They are in a copy, “%@”.", {nameOf(outcome.place)})));
+}
+
+/// The edits are settled: where their document is still shown, it is shown without them.
+void PreviewController::showOnDisk(const Editing& editing)
+{
+    std::erase(_edited, editing);
+    if (_editor && _editor->editing() == editing)
+        removeEditor();
+    _savedVersion.reset();
+    if (!_editor && _item == editing->item())
+        refreshCurrentPreviewItem();
+}
+
+/// Something has happened to the document while it is being changed here.
+void PreviewController::followChange()
+{
+    const auto editing = _editor->editing();
+    editing->checkItem([weak = std::weak_ptr(self()), editing](bool isChanged) {
+        const auto screen = weak.lock();
+        if (!screen || !isChanged || !screen->_editor || screen->_editor->editing() != editing)
+            return;
+        screen->_editor->finishWriting();
+        if (!editing->hasUnsavedEdits())
+            return screen->showOnDisk(editing);
+        screen->_screen->setNote(
+            localized("Another program has changed this document. Your changes will go into a copy."));
+    });
+}
+
+/// There is nobody any more who could be asked, nor a queue that would get to it.
+void PreviewController::programEnds()
+{
+    if (_editor)
+        _editor->finishWriting();
+    for (const auto& editing : std::exchange(_edited, {})) {
+        if (editing->hasUnsavedEdits())
+            editing->keepNow(shouldSave(editing->item()) ? EditsPlace::Document : EditsPlace::Copy);
+    }
+}
+
+/// Over what is on the screen now, which may be another one by the time that something has gone wrong.
+void PreviewController::alert(const std::shared_ptr<ui::ViewController>& alert)
+{
+    const auto own = navigationController();
+    if (const auto navigation = own ? own : _lastNavigation.lock())
+        navigation->presentViewController(alert, true);
+    else
+        presentViewController(alert, true);
+}
+
+} // namespace platform::components

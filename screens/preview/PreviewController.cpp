@@ -1,0 +1,396 @@
+#include "screens/preview/PreviewController.h"
+
+#include "kit/Button.h"
+#include "kit/NavigationController.h"
+#include "kit/NavigationItem.h"
+#include "kit/TextField.h"
+#include "platform/Dispatch.h"
+#include "platform/FileSystem.h"
+#include "platform/ItemDownload.h"
+#include "platform/Localization.h"
+#include "platform/Services.h"
+#include "screens/DisplayName.h"
+#include "screens/preview/PreviewEditor.h"
+#include "screens/preview/PreviewLoader.h"
+#include "screens/preview/PreviewPictureView.h"
+#include "screens/preview/PreviewScreenView.h"
+#include "screens/preview/PreviewSearchBar.h"
+#include "screens/preview/PreviewSummaryView.h"
+#include "screens/preview/PreviewToolbar.h"
+#include "screens/preview/PreviewViews.h"
+
+#include <algorithm>
+#include <chrono>
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+/// A document that is read sooner never shows that it was loading.
+constexpr auto loadingDelay = std::chrono::milliseconds(300);
+
+std::shared_ptr<PreviewSummaryView> summaryView(const PreviewSummaryView::Content& content)
+{
+    const auto view = PreviewSummaryView::create();
+    view->setContent(content);
+    return view;
+}
+
+bool isMedia(const PreviewContent& content)
+{
+    return content.kind == PreviewContent::Kind::Sound || content.kind == PreviewContent::Kind::Film;
+}
+
+} // namespace
+
+PreviewController::PreviewController() = default;
+
+PreviewController::~PreviewController()
+{
+    cancelLoad();
+}
+
+std::shared_ptr<PreviewController> PreviewController::self()
+{
+    return std::static_pointer_cast<PreviewController>(shared_from_this());
+}
+
+void PreviewController::setDataSource(std::weak_ptr<PreviewControllerDataSource> dataSource)
+{
+    _dataSource = std::move(dataSource);
+}
+
+void PreviewController::setAdditionalRightBarButtonItems(ui::BarButtonItems items)
+{
+    _additionalItems = std::move(items);
+    navigationItem().setRightItems(_additionalItems);
+}
+
+void PreviewController::setOpenInHandler(OpenInHandler handler)
+{
+    _openIn = std::move(handler);
+    if (_content)
+        showContent();
+}
+
+void PreviewController::loadView()
+{
+    _screen = PreviewScreenView::create();
+    const std::weak_ptr<PreviewController> weak = self();
+    _screen->toolbar()->setOnFind([weak] {
+        if (const auto screen = weak.lock())
+            screen->beginSearch();
+    });
+    _screen->toolbar()->setOnEdit(calling(&PreviewController::beginEditing));
+    _screen->searchBar()->setOnClose([weak] {
+        if (const auto screen = weak.lock())
+            screen->endSearch();
+    });
+    setView(_screen);
+}
+
+void PreviewController::viewDidLoad()
+{
+    if (_content)
+        showContent();
+    else if (_item)
+        showLoadingAfterDelay();
+    else
+        showNothing();
+}
+
+void PreviewController::viewWillAppear(bool animated)
+{
+    ViewController::viewWillAppear(animated);
+    // Its content was forgotten, or its reading was given up, when it was left.
+    if (_item && !_content && (!_cancelled || *_cancelled)) {
+        load(previewLimitsForMainScreen());
+        showLoadingAfterDelay();
+    }
+}
+
+void PreviewController::viewDidAppear(bool animated)
+{
+    ViewController::viewDidAppear(animated);
+    if (_content)
+        startDownload();
+}
+
+void PreviewController::viewDidDisappear(bool animated)
+{
+    ViewController::viewDidDisappear(animated);
+    if (_previewView)
+        _previewView->stop();
+    // Under another screen it keeps its place.
+    const auto navigation = navigationController();
+    if (!navigation || std::ranges::count(navigation->viewControllers(), shared_from_this()) == 0)
+        close();
+}
+
+void PreviewController::didMoveToParentViewController(const std::shared_ptr<ViewController>& parent)
+{
+    ViewController::didMoveToParentViewController(parent);
+    if (!parent)
+        close();
+    else if (_screen)
+        showToolbar();
+}
+
+/// Ends all work, and keeps nothing of the document but where it is.
+void PreviewController::close()
+{
+    leaveEditing();
+    cancelLoad();
+    leaveDownload();
+    forgetContent();
+}
+
+bool PreviewController::backRequested()
+{
+    if (_editor && _editor->backRequested())
+        return true;
+    if (!_screen || !_screen->isSearching())
+        return ViewController::backRequested();
+    endSearch();
+    return true;
+}
+
+void PreviewController::reloadData()
+{
+    const auto source = _dataSource.lock();
+    const bool hasItem = source && source->numberOfPreviewItemsInPreviewController(*this) > 0;
+    const auto next =
+        hasItem ? std::optional(source->previewControllerPreviewItemAtIndex(*this, 0)) : std::nullopt;
+    leaveEditing(next);
+    _item = next;
+    cancelLoad();
+    leaveDownload();
+    forgetContent();
+    setTitle(_item ? displayName(_item->lastPathComponent()) : std::string());
+    if (!_item)
+        return showNothing();
+    load(previewLimitsForMainScreen());
+    showLoadingAfterDelay();
+}
+
+void PreviewController::refreshCurrentPreviewItem()
+{
+    if (_editor)
+        followChange();
+    else if (_item)
+        load(previewLimitsForMainScreen());
+}
+
+void PreviewController::cancelLoad()
+{
+    ++_generation;
+    if (_cancelled)
+        *_cancelled = true;
+    // What has not begun yet goes with its queue.
+    _queue = nullptr;
+}
+
+void PreviewController::load(const PreviewLimits& limits)
+{
+    cancelLoad();
+    _cancelled = std::make_shared<std::atomic<bool>>(false);
+    const auto main = services().dispatch().mainQueue();
+    _queue = services().dispatch().makeOperationQueue("preview", QualityOfService::UserInitiated);
+    _queue->addOperation([weak = std::weak_ptr(self()), item = *_item, limits, generation = _generation, main,
+                             cancelled = _cancelled, saved = _savedVersion] {
+        // What was saved here is shown already.
+        if (*cancelled || (saved && services().fileSystem().versionOfItem(item.path()) == saved))
+            return;
+        const auto content = std::make_shared<const PreviewContent>(
+            loadPreview(item, limits, [&] { return cancelled->load(); }));
+        main->async([weak, content, generation] {
+            if (const auto screen = weak.lock(); screen && screen->_generation == generation)
+                screen->show(content);
+        });
+    });
+}
+
+void PreviewController::forgetContent()
+{
+    _content = nullptr;
+    _previewView = nullptr;
+    _savedVersion.reset();
+    if (!_screen)
+        return;
+    _screen->setSearching(false);
+    _screen->searchBar()->field()->setText({});
+    _screen->setContent(nullptr);
+    connectPreview();
+}
+
+std::shared_ptr<const PreviewContent> PreviewController::withoutPlayer(
+    std::shared_ptr<const PreviewContent> content) const
+{
+    const auto delegate = _delegate.lock();
+    if (!isMedia(*content) || !delegate || delegate->previewControllerWantsDefaultMediaPlayer(*this, *_item))
+        return content;
+    auto summary = *content;
+    summary.kind = PreviewContent::Kind::Summary;
+    return std::make_shared<const PreviewContent>(std::move(summary));
+}
+
+void PreviewController::show(std::shared_ptr<const PreviewContent> content)
+{
+    _content = withoutPlayer(std::move(content));
+    _savedVersion.reset();
+    setTitle(_content->title);
+    showContent();
+}
+
+void PreviewController::showContent()
+{
+    // Before the screen is shown there is nothing to fill; viewDidLoad catches up.
+    if (!isViewLoaded())
+        return;
+    if (const auto preview = previewViewFor(*_content, _previewView))
+        showPreview(preview);
+    else if (!_download)
+        showSummary();
+    // Who only had a glimpse at it has not asked for it.
+    if (appearanceState() == ui::AppearanceState::Appeared)
+        startDownload();
+}
+
+void PreviewController::showPreview(const std::shared_ptr<PreviewView>& preview)
+{
+    _previewView = preview;
+    // The note of a recording is its kind and size.
+    _screen->setNote(isMedia(*_content) ? std::string() : _content->note);
+    _screen->setContent(preview);
+    connectPreview();
+}
+
+/// A preview that another screen holds in miniature is only looked at.
+void PreviewController::showToolbar()
+{
+    const bool isMiniature = parent() && !navigationController();
+    _screen->toolbar()->setHidden(isMiniature || _editor || _screen->toolbar()->isEmpty());
+    _screen->setNeedsLayout();
+}
+
+void PreviewController::connectPreview()
+{
+    const auto shown = _screen->content() == _previewView ? _previewView : nullptr;
+    _screen->toolbar()->setPreview(shown);
+    _screen->toolbar()->setCanEdit(canEdit());
+    showToolbar();
+    _screen->searchBar()->setPreview(shown);
+    _screen->setNeedsLayout();
+    if (!shown)
+        return;
+    const std::weak_ptr<PreviewController> weak = self();
+    shown->setOnStateChange([weak] {
+        const auto screen = weak.lock();
+        if (!screen)
+            return;
+        screen->_screen->toolbar()->update();
+        screen->_screen->searchBar()->update();
+        if (screen->_editor)
+            screen->_editor->update();
+    });
+    shown->setOnFind([weak] {
+        if (const auto screen = weak.lock())
+            screen->beginSearch();
+    });
+    shown->setOnFailure([weak](const std::string& words) {
+        if (const auto screen = weak.lock())
+            screen->previewFailed(words);
+    });
+    connectPages();
+    if (const auto picture = std::dynamic_pointer_cast<PreviewPictureView>(shown))
+        picture->setOnNeedsPixels([weak] {
+            if (const auto screen = weak.lock())
+                screen->load(previewLimitsForCloseLook());
+        });
+}
+
+void PreviewController::previewFailed(const std::string& words)
+{
+    auto failure = *_content;
+    failure.kind = PreviewContent::Kind::Failure;
+    failure.note = words;
+    show(std::make_shared<const PreviewContent>(std::move(failure)));
+}
+
+std::function<void()> PreviewController::calling(void (PreviewController::*action)())
+{
+    return [weak = std::weak_ptr(self()), action] {
+        if (const auto screen = weak.lock())
+            ((*screen).*action)();
+    };
+}
+
+void PreviewController::showSummary()
+{
+    _summary =
+        summaryView({.iconName = _content->iconName, .title = _content->title, .message = _content->note});
+    std::vector<PreviewSummaryView::Action> actions;
+    if (_content->kind == PreviewContent::Kind::InCloud)
+        actions.push_back({localized("Download"), calling(&PreviewController::startAgain), true});
+    else if (_content->canRetry)
+        actions.push_back({localized("Try Again"), calling(&PreviewController::startAgain), true});
+    else if (_openIn)
+        actions.push_back({localized("Open in…"), calling(&PreviewController::openIn), true});
+    _summary->setActions(actions);
+    _screen->setSearching(false);
+    _screen->setNote({});
+    _screen->setContent(_summary);
+    connectPreview();
+}
+
+void PreviewController::openIn()
+{
+    if (!_item || !_openIn)
+        return;
+    std::shared_ptr<ui::View> from = view();
+    if (_summary && !_summary->buttons().empty())
+        from = _summary->buttons().front();
+    _openIn(*_item, from);
+}
+
+void PreviewController::showNothing()
+{
+    if (_screen)
+        _screen->setContent(summaryView({.title = localized("Nothing to show")}));
+}
+
+void PreviewController::showLoadingAfterDelay()
+{
+    auto& dispatch = services().dispatch();
+    dispatch.after(
+        loadingDelay, dispatch.mainQueue(), [weak = std::weak_ptr(self()), generation = _generation] {
+            const auto screen = weak.lock();
+            if (screen && screen->_generation == generation && !screen->_content && screen->_screen)
+                screen->_screen->setContent(summaryView({.message = localized("Loading…"), .isBusy = true}));
+        });
+}
+
+void PreviewController::beginSearch()
+{
+    if (!_screen || !_previewView || _screen->content() != _previewView || !_previewView->canSearch())
+        return;
+    _screen->setSearching(true);
+    _screen->searchBar()->field()->becomeFirstResponder();
+    if (_previewView->query().empty() && !_screen->searchBar()->field()->text().empty())
+        _previewView->setQuery(_screen->searchBar()->field()->text());
+}
+
+void PreviewController::endSearch()
+{
+    if (!_screen || !_screen->isSearching())
+        return;
+    _screen->searchBar()->field()->resignFirstResponder();
+    _screen->setSearching(false);
+    if (!_previewView)
+        return;
+    _previewView->setQuery({});
+    _previewView->takeFocus();
+}
+
+} // namespace platform::components

@@ -1,0 +1,160 @@
+#pragma once
+
+#include "kit/BarButtonItem.h"
+#include "kit/ViewController.h"
+#include "platform/Error.h"
+#include "platform/FileSystem.h"
+#include "platform/NotificationCenter.h"
+#include "platform/Url.h"
+#include "screens/preview/PreviewControllerProtocols.h"
+
+#include <atomic>
+#include <functional>
+#include <memory>
+#include <optional>
+#include <vector>
+
+namespace platform {
+class ItemDownload;
+class OperationQueue;
+struct DownloadProgress;
+} // namespace platform
+
+namespace platform::ui {
+class AlertController;
+class NavigationController;
+} // namespace platform::ui
+
+namespace platform::components {
+
+class PreviewScreenView;
+class PreviewEditing;
+class PreviewEditor;
+class PreviewSummaryView;
+class PreviewView;
+struct EditsKept;
+struct PreviewContent;
+struct PreviewLimits;
+
+/// The screen that shows one document: a picture, a text, pages, sound or a film, or for everything else its
+/// icon with name, kind and size. Content is read off the main thread, within limits (see PreviewLoader).
+/// Main thread only.
+class PreviewController : public ui::ViewController {
+public:
+    PreviewController();
+    ~PreviewController() override;
+
+    void setDataSource(std::weak_ptr<PreviewControllerDataSource> dataSource);
+    void setDelegate(std::weak_ptr<PreviewControllerDelegate> delegate) { _delegate = std::move(delegate); }
+
+    /// Asks the data source again and shows its first document.
+    void reloadData();
+    /// Reads the document that is shown again; what is shown stays until the new content is there, and the
+    /// page, the zoom and the place after that.
+    void refreshCurrentPreviewItem();
+    /// As of the last reload; nothing when the data source has no document.
+    const std::optional<Url>& currentPreviewItem() const { return _item; }
+
+    /// Buttons at the right end of the navigation bar, the first one at the edge.
+    const ui::BarButtonItems& additionalRightBarButtonItems() const { return _additionalItems; }
+    void setAdditionalRightBarButtonItems(ui::BarButtonItems items);
+
+    /// Opens a document elsewhere, beginning at a view of the screen. Without it no such button is offered.
+    using OpenInHandler = std::function<void(const Url& item, const std::shared_ptr<ui::View>& from)>;
+    void setOpenInHandler(OpenInHandler handler);
+
+    void loadView() override;
+    void viewDidLoad() override;
+    void viewWillAppear(bool animated) override;
+    void viewDidAppear(bool animated) override;
+    void viewDidDisappear(bool animated) override;
+    void didMoveToParentViewController(const std::shared_ptr<ViewController>& parent) override;
+    bool backRequested() override;
+
+    /// What is shown now; null until something is.
+    const std::shared_ptr<const PreviewContent>& content() const { return _content; }
+    /// The view of the document's content; null for what has none.
+    const std::shared_ptr<PreviewView>& previewView() const { return _previewView; }
+    const std::shared_ptr<PreviewScreenView>& screenView() const { return _screen; }
+
+    void beginSearch();
+    void endSearch();
+
+    /// Whether the person may change what is shown: the delegate and the document allow it.
+    bool canEdit() const;
+    void beginEditing();
+    /// Keeps the edits, and goes back to reading.
+    void endEditing();
+    /// Keeps the edits that were made so far.
+    void keepEdits();
+    /// Null unless the document is being changed.
+    const std::shared_ptr<PreviewEditor>& editor() const { return _editor; }
+
+    bool isDownloading() const { return _download != nullptr; }
+    void startDownload();
+    void cancelDownload();
+
+private:
+    using Token = std::shared_ptr<std::atomic<bool>>; ///< true: the load is no longer wanted
+
+    void load(const PreviewLimits& limits);
+    void cancelLoad();
+    void show(std::shared_ptr<const PreviewContent> content);
+    void showContent();
+    void showPreview(const std::shared_ptr<PreviewView>& preview);
+    void showSummary();
+    void showDownload(const DownloadProgress& progress);
+    void downloadEnded(const std::optional<Error>& error);
+    void leaveDownload();
+    void editingBegan(const Result<std::shared_ptr<PreviewEditing>>& begun);
+    void showEditBars();
+    void connectPages();
+    void removeEditor();
+    void leaveEditing(const std::optional<Url>& newItem = std::nullopt);
+    void keep(const std::shared_ptr<PreviewEditing>& editing);
+    void kept(const std::shared_ptr<PreviewEditing>& editing, const EditsKept& outcome);
+    void askForUnsaved(const std::shared_ptr<PreviewEditing>& editing);
+    void addCopyAndDiscard(ui::AlertController& question, const std::shared_ptr<PreviewEditing>& editing);
+    void keptCopy(const std::shared_ptr<PreviewEditing>& editing, const EditsKept& outcome);
+    void showOnDisk(const std::shared_ptr<PreviewEditing>& editing);
+    void askAfterFailure(const std::shared_ptr<PreviewEditing>& editing, const EditsKept& outcome);
+    void followChange();
+    void programEnds();
+    void alert(const std::shared_ptr<ui::ViewController>& alert);
+    bool shouldSave(const Url& item);
+    void startAgain();
+    void openIn();
+    std::function<void()> calling(void (PreviewController::*action)());
+    void showNothing();
+    void showLoadingAfterDelay();
+    void forgetContent();
+    void close();
+    void connectPreview();
+    void showToolbar();
+    void previewFailed(const std::string& words);
+    std::shared_ptr<const PreviewContent> withoutPlayer(std::shared_ptr<const PreviewContent> content) const;
+    std::shared_ptr<PreviewController> self();
+
+    std::weak_ptr<PreviewControllerDataSource> _dataSource;
+    std::weak_ptr<PreviewControllerDelegate> _delegate;
+    OpenInHandler _openIn;
+    std::optional<Url> _item;
+    std::shared_ptr<const PreviewContent> _content;
+    std::shared_ptr<PreviewScreenView> _screen;
+    std::shared_ptr<PreviewView> _previewView; ///< kept while a failure is shown, for the place in it
+    std::shared_ptr<PreviewSummaryView> _summary; ///< what is shown in place of content
+    std::unique_ptr<ItemDownload> _download;
+    std::shared_ptr<PreviewEditor> _editor;
+    std::vector<std::shared_ptr<PreviewEditing>> _edited; ///< those whose edits may not be on the disk yet
+    bool _isEditingWanted = false; ///< the document is being read for it
+    std::optional<ItemVersion> _savedVersion; ///< what was saved here, which is shown already
+    std::weak_ptr<ui::NavigationController> _lastNavigation; ///< where to say what goes wrong afterwards
+    std::vector<Observation> _observations;
+    bool _isDownloadWanted = true; ///< false once the person has stopped it
+    ui::BarButtonItems _additionalItems;
+    std::shared_ptr<OperationQueue> _queue;
+    Token _cancelled;
+    unsigned _generation = 0; ///< of the latest load; an older one that ends is ignored
+};
+
+} // namespace platform::components

@@ -1,0 +1,265 @@
+#include "screens/preview/PreviewEditing.h"
+
+#include "platform/Dispatch.h"
+#include "platform/FileCoordinator.h"
+#include "platform/Services.h"
+
+#include <algorithm>
+#include <deque>
+#include <mutex>
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+constexpr int mostCopies = 1000; ///< of one document
+/// A form of more pages is nobody's to fill in by hand.
+constexpr std::size_t mostPagesOfForm = 2000;
+
+/// "Plan.pdf" becomes "Plan 2.pdf".
+std::string copyName(const std::string& name, int number)
+{
+    if (number == 1)
+        return name;
+    const auto dot = name.rfind('.');
+    const auto end = dot == std::string::npos || dot == 0 ? name.size() : dot;
+    return name.substr(0, end) + ' ' + std::to_string(number) + name.substr(end);
+}
+
+} // namespace
+
+/// What runs on the queue. It is kept by the work that waits, so that nothing that was asked for is lost.
+class PreviewEditing::Work : public std::enable_shared_from_this<Work> {
+public:
+    Work(FileContent content, std::shared_ptr<PagedDocumentEditing> edited)
+        : document(std::move(edited))
+        , _content(std::move(content))
+    {
+    }
+
+    void post(std::function<void()> step)
+    {
+        {
+            const std::lock_guard lock(_mutex);
+            _waiting.push_back(std::move(step));
+        }
+        _queue->async([self = shared_from_this()] { self->runNext(); });
+    }
+
+    /// Runs what waits, on this thread.
+    void finish()
+    {
+        while (runNext()) { }
+    }
+
+    EditsKept keep(EditsPlace place, const Url& item)
+    {
+        const auto written = document->written();
+        if (!written)
+            return {EditsKept::Where::Nowhere, item, written.error};
+        return place == EditsPlace::Document ? save(item, *written.value)
+                                             : writeCopy(item, *written.value, 1);
+    }
+
+    bool isChanged(const Url& item) const
+    {
+        bool isSame = false;
+        services().fileCoordinator().coordinateReading(
+            item, ReadingOptions::ImmediatelyAvailableMetadataOnly, [&](const Url& location) {
+                auto version = services().fileSystem().versionOfItem(location.path());
+                if (version)
+                    version->changed = _content.version.changed; // tags are no content
+                isSame = version == _content.version;
+            });
+        return !isSame;
+    }
+
+    const ItemVersion& version() const { return _content.version; }
+
+    /// Where the document lies: the other place, if it was moved there.
+    Url placeOf(const Url& item, const std::optional<Url>& other) const
+    {
+        const auto moved = other ? services().fileSystem().versionOfItem(other->path()) : std::nullopt;
+        const bool isThere =
+            moved && moved->device == _content.version.device && moved->inode == _content.version.inode;
+        return isThere ? *other : item;
+    }
+
+    const std::shared_ptr<PagedDocumentEditing> document;
+
+private:
+    bool runNext()
+    {
+        const std::lock_guard one(_running);
+        std::function<void()> step;
+        {
+            const std::lock_guard lock(_mutex);
+            if (_waiting.empty())
+                return false;
+            step = std::move(_waiting.front());
+            _waiting.pop_front();
+        }
+        step();
+        return true;
+    }
+
+    EditsKept save(const Url& item, const std::string& bytes)
+    {
+        Result<ItemVersion> replaced = Error(FileErrorCode::Cancelled);
+        const auto refused = services().fileCoordinator().coordinateWriting(
+            item, WritingOptions::ForReplacing, [&](const Url& location) {
+                replaced = services().fileSystem().replaceContent(location.path(), _content, bytes);
+            });
+        if (refused)
+            return {EditsKept::Where::Nowhere, item, refused};
+        if (!replaced.value && replaced.error && replaced.error->is(FileErrorCode::Cancelled))
+            return writeCopy(item, bytes, 2);
+        if (!replaced.value)
+            return {EditsKept::Where::Nowhere, item, replaced.error};
+        _content = {std::make_shared<const std::string>(bytes), *replaced.value};
+        return {EditsKept::Where::Document, item, std::nullopt, *replaced.value};
+    }
+
+    /// The first copy has the document's own name, which is free when that has gone.
+    static EditsKept writeCopy(const Url& item, const std::string& bytes, int firstNumber)
+    {
+        const auto folder = item.deletingLastPathComponent();
+        std::optional<Error> error;
+        for (int number = firstNumber; number <= mostCopies; ++number) {
+            const auto copy = folder.appendingPathComponent(copyName(item.lastPathComponent(), number));
+            const auto refused = services().fileCoordinator().coordinateWriting(
+                copy, WritingOptions::None, [&](const Url& location) {
+                    error = services().fileSystem().addDocument(location.path(), item.path(), bytes);
+                });
+            if (refused || !error)
+                return {refused ? EditsKept::Where::Nowhere : EditsKept::Where::Copy, copy, refused};
+            if (!error->is(FileErrorCode::ItemExists))
+                break;
+        }
+        return {EditsKept::Where::Nowhere, item, error};
+    }
+
+    std::shared_ptr<Queue> _queue = services().dispatch().makeSerialQueue("preview editing");
+    std::mutex _running; ///< held while a step runs
+    std::mutex _mutex;
+    std::deque<std::function<void()>> _waiting;
+    FileContent _content; ///< what the disk held when it was looked at last; of the steps alone
+};
+
+void PreviewEditing::begin(const Url& item, Opened opened)
+{
+    const auto queue = services().dispatch().makeSerialQueue("preview editing");
+    queue->async([queue, item, opened = std::move(opened), main = services().dispatch().mainQueue()] {
+        Result<FileContent> content = Error(FileErrorCode::NoSuchItem);
+        auto error = services().fileCoordinator().coordinateReading(
+            item, ReadingOptions::ImmediatelyAvailableMetadataOnly, [&](const Url& location) {
+                content =
+                    services().fileSystem().contentToReplace(location.path(), PagedDocumentEditing::maxBytes);
+            });
+        if (!error && !content)
+            error = content.error;
+        Result<std::shared_ptr<PagedDocumentEditing>> document =
+            error.value_or(Error(FileErrorCode::NoSuchItem));
+        if (!error)
+            document = services().pagedDocumentOpener().openForEditing(content->bytes);
+        main->async([item, opened, content = std::move(content), document = std::move(document)] {
+            if (!document)
+                return opened(*document.error);
+            opened(std::shared_ptr<PreviewEditing>(std::make_shared<PreviewEditing>(
+                item, std::make_shared<Work>(*content.value, *document.value))));
+        });
+    });
+}
+
+PreviewEditing::PreviewEditing(Url item, std::shared_ptr<Work> work)
+    : _item(std::move(item))
+    , _work(std::move(work))
+    , _pages(_work->document->pages())
+    , _rights(_pages->rights())
+    , _versionRead(_work->version())
+{
+}
+
+/// Runs a step on the queue, and what it answers on the main thread.
+void PreviewEditing::post(std::function<std::function<void()>()> step)
+{
+    _work->post([step = std::move(step), main = services().dispatch().mainQueue()] { main->async(step()); });
+}
+
+void PreviewEditing::apply(PageEdit edit, Stepped done)
+{
+    _steps.push_back(++_lastStep);
+    post([self = shared_from_this(), number = _lastStep, work = _work, edit = std::move(edit),
+             done = std::move(done)]() -> std::function<void()> {
+        return [self, number, done, error = work->document->apply(edit)] {
+            if (error)
+                std::erase(self->_steps, number);
+            done(error);
+        };
+    });
+}
+
+void PreviewEditing::undo(Stepped done)
+{
+    if (_steps.empty())
+        return;
+    _steps.pop_back();
+    post([work = _work, done = std::move(done)]() -> std::function<void()> {
+        work->document->undo();
+        return [done] { done(std::nullopt); };
+    });
+}
+
+void PreviewEditing::readFields(std::function<void(std::vector<FormField>)> completion)
+{
+    post([work = _work, completion = std::move(completion)]() -> std::function<void()> {
+        std::vector<FormField> fields;
+        const auto count = std::min(work->document->pages()->pageCount(), mostPagesOfForm);
+        for (std::size_t page = 0; page < count; ++page) {
+            for (auto& field : work->document->fields(page))
+                fields.push_back(std::move(field));
+        }
+        return [completion, fields = std::move(fields)] { completion(fields); };
+    });
+}
+
+void PreviewEditing::checkItem(std::function<void(bool)> completion)
+{
+    post([work = _work, item = _item, completion = std::move(completion)]() -> std::function<void()> {
+        return [completion, isChanged = work->isChanged(item)] { completion(isChanged); };
+    });
+}
+
+void PreviewEditing::save(Kept kept)
+{
+    keep(EditsPlace::Document, std::move(kept));
+}
+
+void PreviewEditing::saveCopy(Kept kept)
+{
+    keep(EditsPlace::Copy, std::move(kept));
+}
+
+void PreviewEditing::keep(EditsPlace place, Kept kept)
+{
+    post([self = shared_from_this(), work = _work, item = _item, other = _otherPlace, place, step = current(),
+             kept = std::move(kept)]() -> std::function<void()> {
+        return [self, step, kept, outcome = work->keep(place, work->placeOf(item, other))] {
+            if (outcome.where != EditsKept::Where::Nowhere)
+                self->_kept = step;
+            kept(outcome);
+        };
+    });
+}
+
+EditsKept PreviewEditing::keepNow(EditsPlace place)
+{
+    _work->finish();
+    auto outcome = _work->keep(place, _work->placeOf(_item, _otherPlace));
+    if (outcome.where != EditsKept::Where::Nowhere)
+        _kept = current();
+    return outcome;
+}
+
+} // namespace platform::components

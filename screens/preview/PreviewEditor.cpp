@@ -1,0 +1,417 @@
+#include "screens/preview/PreviewEditor.h"
+
+#include "kit/Button.h"
+#include "kit/TextField.h"
+#include "platform/Localization.h"
+#include "screens/AlertParts.h"
+#include "screens/preview/NoteView.h"
+#include "screens/preview/PreviewFieldBar.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace platform::components {
+
+namespace {
+
+constexpr double noteSide = 24; ///< page points
+
+std::string markTitle(const PageMark& mark)
+{
+    switch (mark.kind) {
+    case PageMark::Kind::Highlight:
+        return localized("Highlighted text");
+    case PageMark::Kind::Underline:
+        return localized("Underlined text");
+    case PageMark::Kind::Note:
+        return localized("Note");
+    case PageMark::Kind::Other:
+        break;
+    }
+    return localized("Mark");
+}
+
+} // namespace
+
+std::shared_ptr<ui::ViewController> makeNoteAlert(const PageMark& mark)
+{
+    return messageAlert(markTitle(mark), mark.text);
+}
+
+std::shared_ptr<PreviewEditor> PreviewEditor::create(std::shared_ptr<PreviewEditing> editing,
+    const std::shared_ptr<PreviewPagesView>& pages, Callbacks callbacks)
+{
+    const auto editor = std::make_shared<PreviewEditor>(std::move(editing), pages, std::move(callbacks));
+    editor->connect();
+    return editor;
+}
+
+PreviewEditor::PreviewEditor(std::shared_ptr<PreviewEditing> editing,
+    const std::shared_ptr<PreviewPagesView>& pages, Callbacks callbacks)
+    : _editing(std::move(editing))
+    , _pages(pages)
+    , _callbacks(std::move(callbacks))
+    , _bar(PreviewEditBar::create())
+    , _fieldBar(PreviewFieldBar::create())
+    , _rights(_editing->rights())
+{
+    _fieldBar->setHidden(true);
+}
+
+PreviewEditor::~PreviewEditor()
+{
+    const auto pages = _pages.lock();
+    if (!pages)
+        return;
+    pages->setOnUndo({});
+    pages->setPlacing(false);
+    pages->setActiveField(std::nullopt);
+    pages->setFields({});
+}
+
+void PreviewEditor::connect()
+{
+    const std::weak_ptr<PreviewEditor> weak = shared_from_this();
+    const auto calling = [weak](Step step) {
+        return [weak, step] {
+            if (const auto editor = weak.lock())
+                ((*editor).*step)();
+        };
+    };
+    _bar->setOnTool([weak](EditTool tool) {
+        if (const auto editor = weak.lock())
+            editor->use(tool);
+    });
+    _fieldBar->setOnPress(calling(&PreviewEditor::pressField));
+    _fieldBar->setOnLeave(calling(&PreviewEditor::finishWriting));
+    _fieldBar->setOnNext([weak] {
+        if (const auto editor = weak.lock())
+            editor->use(EditTool::NextField);
+    });
+    if (const auto pages = _pages.lock()) {
+        pages->setOnUndo(calling(&PreviewEditor::undo));
+        pages->setOnTap([weak](const PreviewPagesView::PagePlace& place) {
+            if (const auto editor = weak.lock())
+                editor->tapped(place);
+        });
+    }
+    readFields();
+    update();
+}
+
+std::string PreviewEditor::hint() const
+{
+    const auto pages = _pages.lock();
+    return pages && pages->isPlacing() ? localized("Tap where the note belongs.") : std::string();
+}
+
+void PreviewEditor::update()
+{
+    const auto pages = _pages.lock();
+    if (!pages)
+        return;
+    _bar->setState({.canUndo = _editing->canUndo(),
+        .canMark = _rights.canMark,
+        .hasMarkable = !pages->chosenPlaces().empty(),
+        .hasFields = !pages->fields().empty()});
+}
+
+void PreviewEditor::use(EditTool tool)
+{
+    const auto pages = _pages.lock();
+    if (!pages)
+        return;
+    finishWriting();
+    switch (tool) {
+    case EditTool::Undo:
+        return undo();
+    case EditTool::Highlight:
+        return mark(PageMark::Kind::Highlight);
+    case EditTool::Underline:
+        return mark(PageMark::Kind::Underline);
+    case EditTool::Note:
+        pages->setPlacing(!pages->isPlacing());
+        pages->takeFocus();
+        return _callbacks.layoutDidChange();
+    case EditTool::PreviousField:
+        return stepField(-1);
+    case EditTool::NextField:
+        return stepField(1);
+    case EditTool::Done:
+        return _callbacks.done();
+    }
+}
+
+void PreviewEditor::apply(PageEdit edit)
+{
+    _editing->apply(std::move(edit), [weak = weak_from_this()](const std::optional<Error>& error) {
+        if (const auto editor = weak.lock())
+            editor->changed(error);
+    });
+    update();
+}
+
+void PreviewEditor::undo()
+{
+    if (!_editing->canUndo())
+        return;
+    // What is being written is the last thing that was done.
+    finishWriting();
+    _editing->undo([weak = weak_from_this()](const std::optional<Error>& error) {
+        if (const auto editor = weak.lock())
+            editor->changed(error);
+    });
+    update();
+}
+
+void PreviewEditor::changed(const std::optional<Error>& error)
+{
+    if (error)
+        _callbacks.present(
+            messageAlert(localized("This cannot be changed"), localized("The document does not allow it.")));
+    if (const auto pages = _pages.lock())
+        pages->documentDidChange();
+    readFields();
+    update();
+}
+
+void PreviewEditor::readFields()
+{
+    if (!_rights.canFillForms)
+        return;
+    _editing->readFields([weak = weak_from_this()](std::vector<FormField> fields) {
+        const auto editor = weak.lock();
+        const auto pages = editor ? editor->_pages.lock() : nullptr;
+        if (!pages)
+            return;
+        pages->setFields(std::move(fields));
+        if (const auto* field = pages->activeField())
+            editor->_fieldBar->setField(*field);
+        editor->update();
+    });
+}
+
+void PreviewEditor::mark(PageMark::Kind kind)
+{
+    const auto pages = _pages.lock();
+    if (!pages)
+        return;
+    for (const auto& [page, places] : pages->chosenPlaces())
+        apply(NewMarkEdit{page, kind, places, {}});
+    pages->clearSelection();
+}
+
+void PreviewEditor::stepField(int direction)
+{
+    const auto pages = _pages.lock();
+    if (!pages || pages->fields().empty())
+        return;
+    const auto& fields = pages->fields();
+    const auto count = static_cast<int>(fields.size());
+    int index = direction > 0 ? -1 : count;
+    if (const auto* active = pages->activeField()) {
+        index = static_cast<int>(active - fields.data());
+    } else {
+        // The first one from the page on that is being read.
+        const auto here = std::ranges::find_if(
+            fields, [&](const FormField& field) { return field.page >= pages->currentPage(); });
+        index = static_cast<int>(here - fields.begin()) - (direction > 0 ? 1 : 0);
+    }
+    show(fields[static_cast<std::size_t>((index + direction + count) % count)]);
+}
+
+void PreviewEditor::show(const FormField& field)
+{
+    const auto pages = _pages.lock();
+    if (!pages)
+        return;
+    const bool isText = field.kind == FormField::Kind::Text && !field.isMultiline;
+    _fieldBar->setField(field);
+    if (std::exchange(_hasField, true) == false) {
+        _fieldBar->setHidden(false);
+        _callbacks.layoutDidChange();
+    }
+    pages->setActiveField(field.id);
+    if (isText) {
+        _fieldBar->textField()->becomeFirstResponder();
+    } else {
+        _fieldBar->textField()->resignFirstResponder();
+    }
+}
+
+void PreviewEditor::endField()
+{
+    _fieldBar->textField()->resignFirstResponder();
+    _fieldBar->setHidden(true);
+    _hasField = false;
+    if (const auto pages = _pages.lock())
+        pages->setActiveField(std::nullopt);
+    _callbacks.layoutDidChange();
+}
+
+void PreviewEditor::finishWriting()
+{
+    const auto pages = _pages.lock();
+    const auto* field = pages ? pages->activeField() : nullptr;
+    if (!field)
+        return;
+    if (auto text = _fieldBar->takeText())
+        apply(FieldTextEdit{field->page, field->id, std::move(*text)});
+}
+
+bool PreviewEditor::backRequested()
+{
+    const auto pages = _pages.lock();
+    if (!pages)
+        return false;
+    if (pages->isPlacing()) {
+        pages->setPlacing(false);
+        _callbacks.layoutDidChange();
+        return true;
+    }
+    if (!_hasField)
+        return false;
+    finishWriting();
+    endField();
+    return true;
+}
+
+void PreviewEditor::pressField()
+{
+    const auto pages = _pages.lock();
+    if (const auto* field = pages ? pages->activeField() : nullptr)
+        fillIn(*field);
+}
+
+/// What a tap on a field does at once.
+void PreviewEditor::fillIn(const FormField& field)
+{
+    using Kind = FormField::Kind;
+    if (field.kind == Kind::Choice)
+        choose(field);
+    else if (field.isMultiline)
+        askForText(fieldName(field), field.text, [weak = weak_from_this(), field](const std::string& text) {
+            const auto editor = weak.lock();
+            if (editor && text != field.text)
+                editor->apply(FieldTextEdit{field.page, field.id, text});
+        });
+    else if (field.kind == Kind::CheckBox)
+        apply(FieldStateEdit{field.page, field.id, !field.isOn});
+    else if (field.kind == Kind::RadioButton && !field.isOn)
+        apply(FieldStateEdit{field.page, field.id, true});
+}
+
+void PreviewEditor::choose(const FormField& field)
+{
+    const auto sheet =
+        std::make_shared<ui::AlertController>(fieldName(field), std::string(), ui::AlertStyle::ActionSheet);
+    const std::weak_ptr<PreviewEditor> weak = weak_from_this();
+    const auto applying = [weak](const PageEdit& edit) {
+        return [weak, edit] {
+            if (const auto editor = weak.lock())
+                editor->apply(edit);
+        };
+    };
+    for (std::size_t i = 0; i < field.options.size(); ++i) {
+        const bool isChosen = std::ranges::count(field.chosen, i) > 0;
+        auto chosen = field.takesSeveral ? field.chosen : std::vector<std::size_t>();
+        std::erase(chosen, i);
+        if (!isChosen || !field.takesSeveral)
+            chosen.push_back(i);
+        std::ranges::sort(chosen);
+        sheet->addAction(alertAction((isChosen ? "✓ " : "") + field.options[i], ui::AlertActionStyle::Default,
+            applying(FieldChoiceEdit{field.page, field.id, chosen})));
+    }
+    if (field.takesOtherWords)
+        sheet->addAction(alertAction(localized("Other…"), ui::AlertActionStyle::Default, [weak, field] {
+            const auto editor = weak.lock();
+            if (!editor)
+                return;
+            editor->askForText(fieldName(field), field.text, [weak, field](const std::string& text) {
+                if (const auto asked = weak.lock())
+                    asked->apply(FieldTextEdit{field.page, field.id, text});
+            });
+        }));
+    sheet->addAction(alertAction(localized("Cancel"), ui::AlertActionStyle::Cancel));
+    sheet->setPopoverAnchor(ui::ViewAnchor{_fieldBar->button(), _fieldBar->button()->bounds()});
+    _callbacks.present(sheet);
+}
+
+void PreviewEditor::tapped(const PreviewPagesView::PagePlace& place)
+{
+    const auto pages = _pages.lock();
+    if (!pages)
+        return;
+    finishWriting();
+    if (pages->isPlacing())
+        return placeNote(place);
+    if (const auto* field = pages->fieldAt(place)) {
+        const auto tappedField = *field;
+        show(tappedField);
+        return fillIn(tappedField);
+    }
+    if (_hasField)
+        endField();
+    pages->findMark(place, [weak = weak_from_this(), page = place.page](const auto& mark) {
+        const auto editor = weak.lock();
+        if (editor && mark)
+            editor->showMark(page, *mark);
+    });
+}
+
+void PreviewEditor::placeNote(const PreviewPagesView::PagePlace& place)
+{
+    const auto pages = _pages.lock();
+    pages->setPlacing(false);
+    _callbacks.layoutDidChange();
+    askForText(localized("Note"), {}, [weak = weak_from_this(), place](const std::string& text) {
+        const auto editor = weak.lock();
+        if (!editor || text.empty())
+            return;
+        const Rect there{place.point.x - noteSide / 2, place.point.y - noteSide / 2, noteSide, noteSide};
+        editor->apply(NewMarkEdit{place.page, PageMark::Kind::Note, {there}, text});
+    });
+}
+
+void PreviewEditor::askForText(
+    const std::string& title, const std::string& text, std::function<void(const std::string&)> written)
+{
+    const auto alert = std::make_shared<ui::AlertController>(title, std::string(), ui::AlertStyle::Alert);
+    const auto screen = std::make_shared<NoteScreen>(title, text);
+    alert->setContentViewController(screen);
+    alert->addAction(alertAction(localized("Cancel"), ui::AlertActionStyle::Cancel));
+    const auto done = alertAction(localized("Done"), ui::AlertActionStyle::Default,
+        [note = screen->note(), written = std::move(written)] { written(note->text()); });
+    alert->addAction(done);
+    _callbacks.present(alert);
+}
+
+void PreviewEditor::showMark(std::size_t page, const PageMark& mark)
+{
+    if (mark.isLocked || !_rights.canMark) {
+        if (!mark.text.empty())
+            _callbacks.present(makeNoteAlert(mark));
+        return;
+    }
+    const std::weak_ptr<PreviewEditor> weak = weak_from_this();
+    const auto alert =
+        std::make_shared<ui::AlertController>(markTitle(mark), mark.text, ui::AlertStyle::Alert);
+    alert->addAction(alertAction(mark.text.empty() ? localized("Add Comment") : localized("Change Text"),
+        ui::AlertActionStyle::Default, [weak, page, mark] {
+            const auto editor = weak.lock();
+            if (!editor)
+                return;
+            editor->askForText(markTitle(mark), mark.text, [weak, page, mark](const std::string& text) {
+                if (const auto asked = weak.lock(); asked && text != mark.text)
+                    asked->apply(MarkTextEdit{page, mark.id, text});
+            });
+        }));
+    alert->addAction(alertAction(localized("Remove"), ui::AlertActionStyle::Destructive, [weak, page, mark] {
+        if (const auto editor = weak.lock())
+            editor->apply(MarkRemoval{page, mark.id});
+    }));
+    alert->addAction(alertAction(localized("Cancel"), ui::AlertActionStyle::Cancel));
+    _callbacks.present(alert);
+}
+
+} // namespace platform::components

@@ -1,0 +1,80 @@
+#pragma once
+
+#include "screens/preview/PreviewEditBar.h"
+#include "screens/preview/PreviewEditing.h"
+#include "screens/preview/PreviewPagesView.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+
+namespace platform::ui {
+class ViewController;
+} // namespace platform::ui
+
+namespace platform::components {
+
+class PreviewFieldBar;
+
+/// Lets a person change the pages that a preview screen shows: what the tools do, and what a tap means. Main
+/// thread only.
+class PreviewEditor : public std::enable_shared_from_this<PreviewEditor> {
+public:
+    struct Callbacks {
+        std::function<void(const std::shared_ptr<ui::ViewController>&)> present; ///< an alert
+        std::function<void()> layoutDidChange; ///< the bar of a field came or went
+        std::function<void()> done; ///< the person is ready
+    };
+    static std::shared_ptr<PreviewEditor> create(std::shared_ptr<PreviewEditing> editing,
+        const std::shared_ptr<PreviewPagesView>& pages, Callbacks callbacks);
+    PreviewEditor(std::shared_ptr<PreviewEditing> editing, const std::shared_ptr<PreviewPagesView>& pages,
+        Callbacks callbacks); ///< use create()
+    ~PreviewEditor();
+
+    const std::shared_ptr<PreviewEditing>& editing() const { return _editing; }
+    const std::shared_ptr<PreviewEditBar>& bar() const { return _bar; }
+    const std::shared_ptr<PreviewFieldBar>& fieldBar() const { return _fieldBar; } ///< hidden without a field
+    /// What the person is asked to do next, in words; empty: nothing.
+    std::string hint() const;
+
+    /// Shows the state of the view anew.
+    void update();
+    /// Puts what is being written into its field.
+    void finishWriting();
+    /// The person asks to go back: from what is being done, not from the document. False: nothing was.
+    bool backRequested();
+
+private:
+    using Step = void (PreviewEditor::*)();
+    void connect();
+    void use(EditTool tool);
+    void apply(PageEdit edit);
+    void undo();
+    void changed(const std::optional<Error>& error);
+    void readFields();
+    void mark(PageMark::Kind kind);
+    void stepField(int direction);
+    void show(const FormField& field);
+    void endField();
+    void pressField();
+    void choose(const FormField& field);
+    void tapped(const PreviewPagesView::PagePlace& place);
+    void fillIn(const FormField& field);
+    void placeNote(const PreviewPagesView::PagePlace& place);
+    void askForText(
+        const std::string& title, const std::string& text, std::function<void(const std::string&)> written);
+    void showMark(std::size_t page, const PageMark& mark);
+
+    std::shared_ptr<PreviewEditing> _editing;
+    std::weak_ptr<PreviewPagesView> _pages;
+    Callbacks _callbacks;
+    std::shared_ptr<PreviewEditBar> _bar;
+    std::shared_ptr<PreviewFieldBar> _fieldBar;
+    PagesRights _rights;
+    bool _hasField = false; ///< one is being filled in
+};
+
+/// Shows a note that somebody has written, to be read.
+std::shared_ptr<ui::ViewController> makeNoteAlert(const PageMark& mark);
+
+} // namespace platform::components

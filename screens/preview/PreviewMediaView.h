@@ -1,0 +1,33 @@
+#pragma once
+
+#include "screens/preview/PreviewView.h"
+
+#include <string>
+
+namespace platform::components {
+
+/// Sound or a film in the platform's player, with its controls. It plays when the person starts it and stops
+/// when it is no longer seen.
+class PreviewMediaView : public PreviewView {
+public:
+    static constexpr const char* kindName = "preview.media";
+
+    PreviewMediaView()
+        : PreviewView(kindName)
+    {
+    }
+
+    struct Content {
+        std::string path;
+        std::string title;
+        std::string iconName; ///< stands for sound
+        bool isFilm = false;
+    };
+    const Content& media() const { return _content; }
+    void setMedia(Content content);
+
+private:
+    Content _content;
+};
+
+} // namespace platform::components

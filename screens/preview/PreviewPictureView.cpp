@@ -1,0 +1,26 @@
+#include "screens/preview/PreviewPictureView.h"
+
+#include <utility>
+
+namespace platform::components {
+
+void PreviewPictureView::setPicture(Picture picture)
+{
+    _picture = std::move(picture);
+    _asked = false;
+    native().notify([](auto& native) { native.previewContentDidChange(); });
+}
+
+void PreviewPictureView::userSeesPixels(double width)
+{
+    const int decoded = _picture.frames.empty() ? 0 : _picture.frames.front().image.pixelWidth();
+    // A little more than its pixels looks no different.
+    constexpr double tolerance = 1.2;
+    if (_asked || _picture.sourceWidth <= decoded || width <= decoded * tolerance)
+        return;
+    _asked = true;
+    if (const auto call = _onNeedsPixels)
+        call();
+}
+
+} // namespace platform::components

@@ -1,0 +1,37 @@
+#pragma once
+
+#include "platform/ImageLoader.h"
+#include "screens/preview/PreviewView.h"
+
+#include <functional>
+
+namespace platform::components {
+
+/// A picture that fits its window at first and can be zoomed and moved.
+class PreviewPictureView : public PreviewView {
+public:
+    static constexpr const char* kindName = "preview.picture";
+
+    PreviewPictureView()
+        : PreviewView(kindName)
+    {
+    }
+
+    const Picture& picture() const { return _picture; }
+    void setPicture(Picture picture);
+
+    bool canZoom() const override { return true; }
+
+    /// Called when the picture is shown larger than its pixels and the file has more of them; once for each
+    /// picture.
+    void setOnNeedsPixels(std::function<void()> callback) { _onNeedsPixels = std::move(callback); }
+    /// Event up: the native view shows the picture over so many device pixels.
+    void userSeesPixels(double width);
+
+private:
+    Picture _picture;
+    bool _asked = false;
+    std::function<void()> _onNeedsPixels;
+};
+
+} // namespace platform::components

@@ -1,0 +1,148 @@
+#include "screens/preview/PreviewSearchBar.h"
+
+#include "kit/Button.h"
+#include "kit/Label.h"
+#include "kit/TextField.h"
+#include "platform/Dispatch.h"
+#include "platform/Localization.h"
+#include "platform/Services.h"
+#include "screens/preview/PreviewView.h"
+
+#include <algorithm>
+#include <chrono>
+#include <initializer_list>
+
+namespace platform::components {
+
+namespace {
+
+/// Somebody who types on does not want what was typed so far.
+constexpr auto typingPause = std::chrono::milliseconds(150);
+constexpr double margin = 6, buttonSide = 44, countWidth = 76;
+
+std::shared_ptr<ui::Button> symbolButton(
+    const char* icon, const std::string& label, std::function<void()> action)
+{
+    const auto button = std::make_shared<ui::Button>(std::string(), std::move(action));
+    button->setImage(Image::named(icon));
+    button->setAccessibilityLabel(label);
+    return button;
+}
+
+} // namespace
+
+std::shared_ptr<PreviewSearchBar> PreviewSearchBar::create()
+{
+    const auto bar = std::make_shared<PreviewSearchBar>();
+    bar->build();
+    return bar;
+}
+
+void PreviewSearchBar::build()
+{
+    const auto self = std::static_pointer_cast<PreviewSearchBar>(shared_from_this());
+    const std::weak_ptr<PreviewSearchBar> weak = self;
+    const auto step = [weak](MatchStep direction) {
+        return [weak, direction] {
+            const auto bar = weak.lock();
+            if (const auto preview = bar ? bar->_preview.lock() : nullptr)
+                preview->showMatch(direction);
+        };
+    };
+    _field = std::make_shared<ui::TextField>();
+    _field->setPlaceholder(localized("Search in document"));
+    _field->setAccessibilityLabel(localized("Search in document"));
+    _field->setInputTraits({.returnKey = ui::ReturnKey::Search,
+        .returnKeyNeedsText = false,
+        .capitalization = ui::Capitalization::None,
+        .autocorrection = ui::Autocorrection::Off,
+        .clearButton = ui::ClearButton::WhileEditing});
+    _field->setDelegate(std::shared_ptr<ui::TextFieldDelegate>(self, self.get()));
+    _field->setOnEditingChanged([weak] {
+        if (const auto bar = weak.lock())
+            bar->edited();
+    });
+    _count = std::make_shared<ui::Label>();
+    _count->setFont(ui::Font::preferred(ui::TextStyle::Footnote));
+    _count->setAlignment(ui::TextAlignment::Center);
+    _previous = symbolButton("go-up-symbolic", localized("Previous match"), step(MatchStep::Previous));
+    _next = symbolButton("go-down-symbolic", localized("Next match"), step(MatchStep::Next));
+    _close = symbolButton("window-close-symbolic", localized("End search"), [weak] {
+        const auto bar = weak.lock();
+        if (const auto call = bar ? bar->_onClose : nullptr)
+            call();
+    });
+    for (const auto& part :
+        std::initializer_list<std::shared_ptr<ui::View>>{_field, _count, _previous, _next, _close})
+        addSubview(part);
+    update();
+}
+
+void PreviewSearchBar::edited()
+{
+    const auto self = std::static_pointer_cast<PreviewSearchBar>(shared_from_this());
+    auto& dispatch = services().dispatch();
+    dispatch.after(typingPause, dispatch.mainQueue(), [weak = std::weak_ptr(self), edits = ++_edits] {
+        const auto bar = weak.lock();
+        const auto preview = bar && bar->_edits == edits ? bar->_preview.lock() : nullptr;
+        if (preview)
+            preview->setQuery(bar->_field->text());
+    });
+}
+
+bool PreviewSearchBar::textFieldShouldReturn(ui::TextField& field)
+{
+    const auto preview = _preview.lock();
+    if (!preview)
+        return true;
+    if (preview->query() == field.text())
+        preview->showMatch(MatchStep::Next);
+    else
+        preview->setQuery(field.text());
+    return true;
+}
+
+void PreviewSearchBar::setPreview(const std::shared_ptr<PreviewView>& preview)
+{
+    _preview = preview;
+    update();
+}
+
+std::string PreviewSearchBar::countText() const
+{
+    const auto preview = _preview.lock();
+    if (!preview || preview->query().empty())
+        return {};
+    const auto& state = preview->searchState();
+    if (state.matches == 0)
+        return state.isComplete ? localized("No matches") : localized("Searching…");
+    return localized(
+        "%1$d of %2$d", {static_cast<std::int64_t>(state.current), static_cast<std::int64_t>(state.matches)});
+}
+
+void PreviewSearchBar::update()
+{
+    const auto preview = _preview.lock();
+    const bool hasMatches = preview && preview->searchState().matches > 0;
+    _count->setText(countText());
+    _previous->setEnabled(hasMatches);
+    _next->setEnabled(hasMatches);
+}
+
+void PreviewSearchBar::layoutSubviews()
+{
+    const double width = bounds().width;
+    const bool isMirrored = traits().layoutDirection == ui::LayoutDirection::RightToLeft;
+    double x = margin;
+    const auto place = [&](ui::View& view, double itemWidth, double inset) {
+        view.setFrame({isMirrored ? width - x - itemWidth : x, inset, itemWidth, barHeight - 2 * inset});
+        x += itemWidth;
+    };
+    const double taken = countWidth + 3 * buttonSide + 2 * margin;
+    place(*_field, std::max(0.0, width - taken), margin);
+    place(*_count, countWidth, 2);
+    for (const auto& button : {_previous, _next, _close})
+        place(*button, buttonSide, 2);
+}
+
+} // namespace platform::components

@@ -1,0 +1,13 @@
+#include "screens/preview/PreviewTextView.h"
+
+#include <utility>
+
+namespace platform::components {
+
+void PreviewTextView::setText(Content content)
+{
+    _content = std::move(content);
+    native().notify([](auto& native) { native.previewContentDidChange(); });
+}
+
+} // namespace platform::components

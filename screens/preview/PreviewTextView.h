@@ -1,0 +1,34 @@
+#pragma once
+
+#include "screens/preview/PreviewView.h"
+
+#include <string>
+
+namespace platform::components {
+
+/// A text to read, select and search. Zooming makes the letters larger.
+class PreviewTextView : public PreviewView {
+public:
+    static constexpr const char* kindName = "preview.text";
+
+    PreviewTextView()
+        : PreviewView(kindName)
+    {
+    }
+
+    struct Content {
+        std::string text; ///< UTF-8 without NUL characters
+        std::string fileName; ///< tells the language of a source
+        bool isSource = false; ///< with the colours of its language, in letters of one width
+    };
+    const Content& text() const { return _content; }
+    void setText(Content content);
+
+    bool canZoom() const override { return true; }
+    bool canSearch() const override { return true; }
+
+private:
+    Content _content;
+};
+
+} // namespace platform::components

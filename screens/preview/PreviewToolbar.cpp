@@ -1,0 +1,133 @@
+#include "screens/preview/PreviewToolbar.h"
+
+#include "kit/Button.h"
+#include "kit/Label.h"
+#include "platform/Localization.h"
+#include "screens/preview/PreviewPagesView.h"
+
+namespace platform::components {
+
+namespace {
+
+std::shared_ptr<ui::Button> symbolButton(const char* icon, const std::string& label)
+{
+    const auto button = std::make_shared<ui::Button>();
+    button->setImage(Image::named(icon));
+    button->setAccessibilityLabel(label);
+    return button;
+}
+
+} // namespace
+
+std::shared_ptr<PreviewToolbar> PreviewToolbar::create()
+{
+    const auto bar = std::make_shared<PreviewToolbar>();
+    bar->build();
+    return bar;
+}
+
+void PreviewToolbar::build()
+{
+    _find = symbolButton("system-search-symbolic", localized("Search in document"));
+    _copy = symbolButton("edit-copy-symbolic", localized("Copy"));
+    _edit = symbolButton("document-edit-symbolic", localized("Edit document"));
+    _zoomOut = symbolButton("zoom-out-symbolic", localized("Smaller"));
+    _zoomIn = symbolButton("zoom-in-symbolic", localized("Larger"));
+    _page = std::make_shared<ui::Label>();
+    _page->setFont(ui::Font::preferred(ui::TextStyle::Footnote));
+    _page->setAlignment(ui::TextAlignment::Center);
+    for (const auto& part :
+        std::initializer_list<std::shared_ptr<ui::View>>{_find, _copy, _page, _edit, _zoomOut, _zoomIn})
+        addSubview(part);
+    const auto self = std::static_pointer_cast<PreviewToolbar>(shared_from_this());
+    const auto act = [weak = std::weak_ptr(self)](auto action) {
+        return [weak, action] {
+            if (const auto bar = weak.lock())
+                action(*bar);
+        };
+    };
+    _find->setAction(act([](PreviewToolbar& bar) {
+        if (const auto call = bar._onFind)
+            call();
+    }));
+    _copy->setAction(act([](PreviewToolbar& bar) {
+        if (const auto preview = bar._preview.lock())
+            preview->copy();
+    }));
+    _edit->setAction(act([](PreviewToolbar& bar) {
+        if (const auto call = bar._onEdit)
+            call();
+    }));
+    _zoomOut->setAction(act([](PreviewToolbar& bar) { bar.zoomBy(1 / PreviewView::zoomStep); }));
+    _zoomIn->setAction(act([](PreviewToolbar& bar) { bar.zoomBy(PreviewView::zoomStep); }));
+    update();
+}
+
+void PreviewToolbar::zoomBy(double factor)
+{
+    if (const auto preview = _preview.lock())
+        preview->setZoom(preview->zoom() * factor);
+}
+
+void PreviewToolbar::setCanEdit(bool canEdit)
+{
+    _canEdit = canEdit;
+    update();
+}
+
+void PreviewToolbar::setPreview(const std::shared_ptr<PreviewView>& preview)
+{
+    _preview = preview;
+    update();
+}
+
+bool PreviewToolbar::isEmpty() const
+{
+    const auto preview = _preview.lock();
+    return !preview || (!preview->canZoom() && !preview->canSearch());
+}
+
+std::string PreviewToolbar::pageText() const
+{
+    const auto pages = std::dynamic_pointer_cast<PreviewPagesView>(_preview.lock());
+    if (!pages || pages->pageCount() == 0)
+        return {};
+    return localized("%1$d of %2$d",
+        {static_cast<std::int64_t>(pages->currentPage() + 1), static_cast<std::int64_t>(pages->pageCount())});
+}
+
+void PreviewToolbar::update()
+{
+    const auto preview = _preview.lock();
+    const bool zooms = preview && preview->canZoom();
+    _find->setHidden(!preview || !preview->canSearch());
+    _copy->setHidden(!preview || !preview->canCopy());
+    _edit->setHidden(!preview || !_canEdit);
+    _zoomOut->setHidden(!zooms);
+    _zoomIn->setHidden(!zooms);
+    _zoomOut->setEnabled(zooms && preview->zoom() > PreviewView::minZoom);
+    _zoomIn->setEnabled(zooms && preview->zoom() < PreviewView::maxZoom);
+    const auto page = pageText();
+    _page->setText(page);
+    _page->setHidden(page.empty());
+    _page->setAccessibilityLabel(page.empty() ? page : localized("Page %@", {page}));
+    setNeedsLayout();
+}
+
+void PreviewToolbar::layoutSubviews()
+{
+    const double width = bounds().width;
+    const bool isMirrored = traits().layoutDirection == ui::LayoutDirection::RightToLeft;
+    const auto place = [&](ui::View& view, double x, double itemWidth) {
+        view.setFrame({isMirrored ? width - x - itemWidth : x, 0, itemWidth, barHeight});
+    };
+    place(*_find, 0, barHeight);
+    place(*_copy, barHeight, barHeight);
+    const double pageEnd = width - (_edit->isHidden() ? 2 : 3) * barHeight;
+    place(*_page, 2 * barHeight, std::max(0.0, pageEnd - 2 * barHeight));
+    place(*_edit, pageEnd, barHeight);
+    place(*_zoomOut, width - 2 * barHeight, barHeight);
+    place(*_zoomIn, width - barHeight, barHeight);
+}
+
+} // namespace platform::components

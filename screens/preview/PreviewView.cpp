@@ -1,0 +1,82 @@
+#include "screens/preview/PreviewView.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace platform::components {
+
+void PreviewView::setZoom(double zoom)
+{
+    const double kept = std::clamp(zoom, minZoom, maxZoom);
+    if (kept == _zoom)
+        return;
+    _zoom = kept;
+    _native.notify([](auto& native) { native.previewZoomDidChange(); });
+    stateDidChange();
+}
+
+void PreviewView::userZoomed(double zoom)
+{
+    const double kept = std::clamp(zoom, minZoom, maxZoom);
+    if (std::exchange(_zoom, kept) != kept)
+        stateDidChange();
+}
+
+void PreviewView::setQuery(std::string query)
+{
+    if (query == _query)
+        return;
+    _query = std::move(query);
+    _search = {};
+    queryDidChange();
+    _native.notify([](auto& native) { native.previewQueryDidChange(); });
+    stateDidChange();
+}
+
+void PreviewView::showMatch(MatchStep step)
+{
+    _native.notify([step](auto& native) { native.previewShouldShowMatch(step); });
+}
+
+void PreviewView::setSearchState(const SearchState& state)
+{
+    if (state == _search)
+        return;
+    _search = state;
+    stateDidChange();
+}
+
+void PreviewView::stop()
+{
+    _native.notify([](auto& native) { native.previewShouldStop(); });
+}
+
+void PreviewView::takeFocus()
+{
+    _native.notify([](auto& native) { native.previewShouldTakeFocus(); });
+}
+
+void PreviewView::copy()
+{
+    _native.notify([](auto& native) { native.previewShouldCopy(); });
+}
+
+void PreviewView::userWantsToFind()
+{
+    if (const auto call = _onFind)
+        call();
+}
+
+void PreviewView::nativeFailed(const std::string& words)
+{
+    if (const auto call = _onFailure)
+        call(words);
+}
+
+void PreviewView::stateDidChange()
+{
+    if (const auto call = _onStateChange)
+        call();
+}
+
+} // namespace platform::components

@@ -1,0 +1,16 @@
+#pragma once
+
+#include "screens/preview/PreviewContent.h"
+
+#include <memory>
+
+namespace platform::components {
+
+class PreviewView;
+
+/// The view for a content: the one that shows the content before when it is of the same kind, so that place
+/// and zoom stay, else a new one. Null for what has no view of its own (a summary, a failure). Main thread.
+std::shared_ptr<PreviewView> previewViewFor(
+    const PreviewContent& content, const std::shared_ptr<PreviewView>& before);
+
+} // namespace platform::components

@@ -1,0 +1,134 @@
+#include "tests/screens/support/ComponentsFixture.h"
+
+#include "kit/AlertController.h"
+#include "kit/View.h"
+#include "platform/Localization.h"
+#include "screens/DocumentInteractionSheet.h"
+
+#include <gmock/gmock.h>
+
+using namespace platform;
+using namespace platform::components;
+using testing::ElementsAre;
+using testing::IsEmpty;
+using testing_support::ComponentsFixture;
+using testing_support::SimulatedApps;
+
+namespace {
+
+using Lines = std::vector<std::string>;
+
+struct CountingSheetDelegate : DocumentInteractionSheetDelegate {
+    void documentInteractionControllerDidDismissOptionsMenu(
+        const std::shared_ptr<DocumentInteractionSheet>&) override
+    {
+        ++dismissed;
+    }
+    int dismissed = 0;
+};
+
+class DocumentInteraction : public ComponentsFixture {
+protected:
+    /// Shows the menu of an item; what it offers.
+    Lines offeredFor(const Url& url)
+    {
+        sheet = DocumentInteractionSheet::interactionControllerWithURL(url);
+        sheet->setDelegate(told);
+        sheet->presentOptionsMenuFromRectInView(screen, {0, 0, 10, 0}, screen->view(), false);
+        return titles();
+    }
+    std::shared_ptr<ui::AlertController> alert() const
+    {
+        return std::static_pointer_cast<ui::AlertController>(screen->presentedViewController());
+    }
+    Lines titles() const
+    {
+        Lines found;
+        for (const auto& action : alert()->actions())
+            found.push_back(action->title());
+        return found;
+    }
+    void choose(const std::string& title) const
+    {
+        const auto menu = alert();
+        for (const auto& action : menu->actions()) {
+            if (action->title() == title) {
+                menu->press(action);
+                return;
+            }
+        }
+        FAIL() << title;
+    }
+
+    std::shared_ptr<ui::ViewController> screen = std::make_shared<ui::ViewController>();
+    std::shared_ptr<DocumentInteractionSheet> sheet;
+    std::shared_ptr<CountingSheetDelegate> told = std::make_shared<CountingSheetDelegate>();
+};
+
+TEST_F(DocumentInteraction, OffersWhatFitsTheItem)
+{
+    const auto report = drive.writeDocument("Report.pdf"), note = drive.writeDocument("note.txt"),
+               folder = drive.makeFolder("Stuff"), far = drive.writePromise("Far.pdf", {});
+    apps->available = {{"Alternate", {SimulatedApps::make("editor"), SimulatedApps::make("importer", false)}},
+        {"Owner", {SimulatedApps::make("editor"), SimulatedApps::make("own")}}};
+    EXPECT_THAT(offeredFor(report),
+        ElementsAre("Open in The editor", "Send by Mail", "Copy Path", "Copy Link", "Show in File Manager",
+            "Print", "Cancel"));
+    EXPECT_EQ(alert()->title(), "Report.pdf");
+    choose("Cancel");
+    sharing->hasMailer = false;
+    EXPECT_THAT(offeredFor(note),
+        ElementsAre("Open in The editor", "Copy Path", "Copy Link", "Show in File Manager", "Cancel"));
+    choose("Cancel");
+    apps->available.clear();
+    sharing->hasMailer = true;
+    EXPECT_THAT(offeredFor(folder), ElementsAre("Copy Path", "Copy Link", "Show in File Manager", "Cancel"));
+    choose("Cancel");
+    EXPECT_THAT(offeredFor(far), ElementsAre("Copy Path", "Copy Link", "Cancel"));
+    EXPECT_FALSE(alert()->message().empty()) << "it says that the content is not here";
+    choose("Cancel");
+    EXPECT_EQ(told->dismissed, 4);
+}
+
+TEST_F(DocumentInteraction, DoesWhatWasChosenOnce)
+{
+    const auto report = drive.writeDocument("100% & more.pdf");
+    for (const auto* title : {"Send by Mail", "Copy Path", "Copy Link", "Show in File Manager", "Print"}) {
+        offeredFor(report);
+        choose(title);
+        EXPECT_EQ(alert(), nullptr) << title;
+    }
+    const auto folder = report.deletingLastPathComponent().path();
+    EXPECT_THAT(sharing->lines,
+        ElementsAre("mail 100% & more.pdf", "copy " + report.path(),
+            "copy tarrowdriveapp://" + folder + "/100%2525%2520&%2520more.pdf", "show 100% & more.pdf",
+            "print 100% & more.pdf"));
+    EXPECT_EQ(told->dismissed, 5);
+}
+
+TEST_F(DocumentInteraction, OpensInAnyOfManyAppsAndSaysWhenOneDoesNotStart)
+{
+    const auto note = drive.writeDocument("note.txt");
+    std::vector<AppHandle> many;
+    for (const auto* name : {"a", "b", "c", "d", "e"})
+        many.push_back(SimulatedApps::make(name));
+    apps->available = {{"Owner", many}};
+    EXPECT_EQ(offeredFor(note)[DocumentInteractionSheet::directApps], "Other Apps…");
+    choose("Other Apps…");
+    EXPECT_THAT(titles(), ElementsAre("Open in The d", "Open in The e", "Cancel"));
+    choose("Open in The e");
+    EXPECT_THAT(apps->opened, ElementsAre(SimulatedApps::Opened{note, "e"}));
+
+    apps->appsStart = false;
+    offeredFor(note);
+    choose("Open in The a");
+    EXPECT_EQ(alert()->title(), "The a could not be started");
+    choose("OK");
+    sharing->answer = Error(FileErrorCode::Unsupported);
+    offeredFor(note);
+    choose("Send by Mail");
+    ASSERT_TRUE(alert());
+    EXPECT_THAT(titles(), ElementsAre("OK"));
+}
+
+} // namespace

@@ -1,0 +1,250 @@
+// What a person does in a folder's list: tap, choose, select, type, search.
+
+#include "tests/screens/support/DocumentListFixture.h"
+
+#include "kit/AlertController.h"
+#include "kit/NavigationItem.h"
+#include "kit/SearchPresentation.h"
+#include "screens/FolderPlaces.h"
+
+#include <map>
+
+using namespace platform;
+using namespace platform::components;
+using testing::ElementsAre;
+using testing_support::DocumentList;
+using testing_support::HandLister;
+using testing_support::Lines;
+using testing_support::RecordingListObserver;
+
+namespace {
+
+using Kind = FolderEntryKind;
+
+TEST_F(DocumentList, ReportsWhatIsTapped)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    deliver(
+        list, {{"Trip", Kind::Folder}, {"Notes.txt"}, {"Letter.pages", Kind::Package}, {"To", Kind::Link}});
+    EXPECT_EQ(delegate->take(), (Lines{"changed 4 selected 0"}));
+    for (std::size_t row = 0; row < 5; ++row)
+        list->listView()->activateRow(row);
+    EXPECT_EQ(
+        delegate->take(), (Lines{"folder Trip Trip", "item Notes.txt", "item Letter.pages", "item To"}));
+}
+
+TEST_F(DocumentList, OffersTheEnabledActionsWithTheirCodes)
+{
+    makePaintLibrary();
+    const auto list = shownList(*DocumentListController::createRootList()->presentedURL());
+    deliver(list, {{"Notes.txt"}});
+    delegate->take();
+    EXPECT_TRUE(list->listView()->menuForRow(1).empty());
+
+    list->setAvailableActions(125);
+    for (const auto& entry : list->listView()->menuForRow(1))
+        entry.handler();
+    EXPECT_EQ(delegate->take(),
+        (Lines{"action 2 Notes.txt", "action 4 Notes.txt", "action 3 Notes.txt", "action 5 Notes.txt",
+            "action 0 Notes.txt"}));
+
+    Lines titlesOfLibrary;
+    for (const auto& entry : list->listView()->menuForRow(0))
+        titlesOfLibrary.push_back(entry.title);
+    EXPECT_EQ(titlesOfLibrary, (Lines{"Info", "Share", "Delete"}));
+}
+
+TEST_F(DocumentList, AnswersTheKeysOfItsRows)
+{
+    makePaintLibrary();
+    const auto list = shownList(*DocumentListController::createRootList()->presentedURL());
+    deliver(list, {{"Notes.txt"}});
+    list->setAvailableActions(125 & ~actionBit(DocumentListAction::Delete));
+    delegate->take();
+    const struct {
+        std::size_t row;
+        ui::RowCommand command;
+        Lines told;
+    } rows[] = {
+        {1, ui::RowCommand::Rename, {"action 3 Notes.txt"}},
+        {1, ui::RowCommand::Info, {"action 2 Notes.txt"}},
+        {1, ui::RowCommand::Delete, {}}, // not enabled
+        {1, ui::RowCommand::Peek, {}}, // nothing to show
+        {0, ui::RowCommand::Rename, {}}, // not for a library
+        {7, ui::RowCommand::Info, {}},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ(list->listView()->commandRow(row.row, row.command), !row.told.empty());
+        EXPECT_EQ(delegate->take(), row.told);
+    }
+}
+
+TEST_F(DocumentList, AHeldRowShowsItsScreenWithWhatCanBeDoneWithIt)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    deliver(list, {{"a.txt"}, {"b.txt"}});
+    list->setAvailableActions(125);
+    delegate->take();
+    delegate->preview = std::make_shared<ui::ViewController>();
+    const auto peek = [&] {
+        EXPECT_TRUE(list->listView()->commandRow(1, ui::RowCommand::Peek));
+        drive.dispatch->runUntilIdle();
+        return std::dynamic_pointer_cast<ui::AlertController>(list->presentedViewController());
+    };
+    auto shown = peek();
+    ASSERT_TRUE(shown);
+    EXPECT_EQ(shown->title(), "b.txt");
+    shown->view();
+    EXPECT_TRUE(delegate->preview->parent());
+    shown->userCancelled();
+    EXPECT_FALSE(list->presentedViewController());
+    EXPECT_EQ(delegate->take(), Lines{});
+
+    shown = peek();
+    shown->view();
+    shown->press(shown->preferredAction());
+    EXPECT_EQ(delegate->take(), Lines{"action 6 b.txt"});
+    EXPECT_FALSE(delegate->preview->parent());
+
+    list->setAvailableActions(actionBit(DocumentListAction::Info));
+    shown = peek();
+    EXPECT_EQ(shown->actions().size(), 3U); // open, info, cancel
+    shown->press(shown->preferredAction());
+    EXPECT_EQ(delegate->take(), Lines{"item b.txt"});
+
+    list->setEditingAnimated(true, false);
+    EXPECT_FALSE(list->listView()->holdRow(1));
+}
+
+TEST_F(DocumentList, FindsRowsByWhatIsTypedInEveryScript)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    const HandLister::Entries entries{{"cafe.txt"}, {"Caf\u00e9 two"}, {"Cafe\u0301 three"},
+        {"\u041e\u0442\u0447\u0451\u0442 1"}, {"\u041e\u0442\u0447\u0435\u0442 2"}, {"\u00c9"},
+        {"\uff34\uff4f"}, {"no\xffutf8"}, {"x"}};
+    deliver(list, entries);
+    const struct {
+        const char* typed;
+        std::size_t from;
+        std::optional<std::size_t> found;
+    } rows[] = {
+        {"caf", 0, 0},
+        {"CAF\u00c9 T", 0, 1},
+        {"cafe th", 0, 2},
+        {"\u043e\u0442\u0447\u0435\u0442", 0, 3},
+        {"\u041e\u0422\u0427\u0401\u0422 2", 0, 4},
+        {"e", 0, 5},
+        {"\u00e9", 6, 5}, // from the top again
+        {"to", 0, 6},
+        {"no", 0, 7},
+        {"\u044f", 0, std::nullopt},
+        {"xx", 0, std::nullopt},
+    };
+    for (const auto& row : rows)
+        EXPECT_EQ(list->listView()->rowBeginningWith(row.typed, row.from), row.found) << row.typed;
+}
+
+TEST_F(DocumentList, SelectingByTheKeyboardAsksForEditMode)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    deliver(list, {{"a"}, {"b"}, {"c"}, {"d"}});
+    delegate->take();
+    list->listView()->selectAllByUser();
+    EXPECT_EQ(list->selectedItemCount(), 0U);
+    EXPECT_EQ(delegate->take(), Lines{"wants to select"});
+
+    delegate->allowsEditing = true;
+    list->listView()->extendSelectionTo(1);
+    list->listView()->extendSelectionTo(3);
+    EXPECT_EQ(list->selectedItemCount(), 3U);
+    list->listView()->extendSelectionTo(0);
+    EXPECT_EQ(list->selectedItems(), (std::vector{drive.url("Stuff/a"), drive.url("Stuff/b")}));
+    list->selectAllItems();
+    EXPECT_EQ(list->selectedItemCount(), 4U);
+    list->deselectAllItems();
+    EXPECT_EQ(list->selectedItemCount(), 0U);
+}
+
+TEST_F(DocumentList, SelectsWhileEditingAndKeepsTheSelectionThroughChanges)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    list->setAvailableActions(125);
+    deliver(list, {{"a"}, {"b"}, {"c"}, {"d"}});
+    list->setSelectedItems({drive.url("Stuff/a")});
+    EXPECT_TRUE(list->selectedItems().empty());
+
+    list->setEditingAnimated(true, true);
+    delegate->take();
+    list->listView()->activateRow(3);
+    list->listView()->activateRow(1);
+    EXPECT_EQ(delegate->take(), (Lines{"changed 4 selected 1", "changed 4 selected 2"}));
+    EXPECT_TRUE(list->listView()->menuForRow(0).empty());
+
+    const auto observer = std::make_shared<RecordingListObserver>();
+    list->listView()->setListObserver(observer);
+    deliver(list, {{"0"}, {"a"}, {"b"}, {"d"}});
+    EXPECT_EQ(list->selectedItems(), (std::vector{drive.url("Stuff/b"), drive.url("Stuff/d")}));
+    EXPECT_EQ(observer->last.splices, (std::vector<ui::ListSplice>{{0, 0, 1}, {3, 1, 0}}));
+    EXPECT_EQ(observer->resets, 0);
+    EXPECT_EQ(list->listView()->row(2).check, ui::CheckState::On);
+
+    deliver(list, {{"a"}, {"b"}});
+    EXPECT_EQ(list->selectedItems(), std::vector{drive.url("Stuff/b")});
+    list->setSelectedItems({drive.url("Stuff/a"), drive.url("Stuff/gone"), drive.url("Elsewhere/b")});
+    EXPECT_EQ(list->selectedItems(), std::vector{drive.url("Stuff/a")});
+    list->setEditingAnimated(false, true);
+    EXPECT_EQ(list->selectedItemCount(), 0U);
+}
+
+TEST_F(DocumentList, SearchesTheWholeDriveAndSaysWhereItemsLie)
+{
+    drive.writeDocument("Stuff/Spain/My trip.txt");
+    drive.makeFolder("Stuff/Trip");
+    drive.writeDocument("trip plan.txt");
+    const auto list = shownList(drive.url("Stuff"));
+    list->startSearchWithQueryStringBecomeFirstResponder("TRIP", true);
+    drive.dispatch->runUntilIdle();
+    const auto search = std::dynamic_pointer_cast<ui::SearchPresentation>(list->presentedViewController());
+    ASSERT_TRUE(search);
+    EXPECT_TRUE(search->hasFocus());
+    const auto results = std::dynamic_pointer_cast<ui::ListView>(search->view()->subviews().front());
+    ASSERT_TRUE(results);
+    results->setFrame({0, 0, 360, 600});
+    results->layoutIfNeeded();
+    drive.dispatch->runUntilIdle();
+    std::map<std::string, std::string> places;
+    for (std::size_t row = 0; row < results->rowCount(); ++row)
+        places[results->row(row).title] = results->row(row).detail;
+    EXPECT_THAT(places,
+        testing::ElementsAre(testing::Pair("My trip.txt", testing::StartsWith("Stuff › Spain · ")),
+            testing::Pair("Trip", testing::StartsWith("Stuff · ")),
+            testing::Pair("trip plan.txt", testing::StartsWith(folderTitle(drive.url(""))))));
+
+    search->userEditedQuery("my");
+    drive.dispatch->runUntilIdle();
+    ASSERT_EQ(results->rowCount(), 1U);
+    delegate->take();
+    results->activateRow(0);
+    results->menuForRow(0).front().handler();
+    EXPECT_EQ(delegate->take(), (Lines{"item My trip.txt", "folder Spain Spain"}));
+    search->userEditedQuery("");
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(results->rowCount(), 0U);
+}
+
+struct ListWithoutSearch : DocumentListController {
+    using DocumentListController::DocumentListController;
+    bool shouldShowSearch() const override { return false; }
+};
+
+TEST_F(DocumentList, OffersASearchFieldUnlessItShouldNot)
+{
+    const auto plain = shownList(drive.makeFolder("Stuff"));
+    EXPECT_TRUE(plain->navigationItem().searchAction());
+    const auto without = std::make_shared<ListWithoutSearch>(std::nullopt);
+    without->view();
+    EXPECT_FALSE(without->navigationItem().searchAction());
+    EXPECT_TRUE(without->containedItems().empty());
+}
+
+} // namespace

@@ -1,0 +1,242 @@
+// What the rows of a folder's list show.
+
+#include "tests/screens/support/DocumentListFixture.h"
+
+#include "host/drive/ItemFacts.h"
+#include "kit/AlertController.h"
+#include "platform/Localization.h"
+#include "screens/list/RowThumbnail.h"
+
+#include <filesystem>
+#include <fstream>
+
+using namespace platform;
+using namespace platform::components;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing_support::DocumentList;
+using testing_support::HandLister;
+using testing_support::Lines;
+using testing_support::RecordingListObserver;
+namespace mark = host::drive::itemMark;
+
+namespace {
+
+using Kind = FolderEntryKind;
+
+struct RowOfKind {
+    HandLister::Entry entry;
+    std::string detail; ///< the end of the second line
+    ui::DownloadState download = ui::DownloadState::Present;
+    ui::RowAccessory accessory = ui::RowAccessory::None;
+    std::size_t dots = 0;
+};
+
+TEST_F(DocumentList, ShowsEveryKindOfItemWithItsDetails)
+{
+    drive.writeDocument("Stuff/Notes.txt", std::string(1500, 'x'));
+    drive.writeDocument("Stuff/Trip/one.txt");
+    drive.writeDocument("Stuff/Trip/.hidden");
+    drive.writePromise("Stuff/Trip/two.txt", {});
+    host::drive::PromiseRecord farAway;
+    farAway.size = 2'000'000;
+    farAway.tags = {"Red", "Work"};
+    drive.writePromise("Stuff/Far.pdf", farAway);
+    drive.mark(drive.writeDocument("Stuff/Ours.txt", "abc"), mark::shared, "1");
+    drive.writeLink("Stuff/Pointer", "Notes.txt");
+    drive.makeFolder("Stuff/Letter.pages");
+    drive.writeDocument("Stuff/bad\xFF\u202Egpj.exe");
+    const RowOfKind rows[] = {
+        {{"Trip", Kind::Folder}, localizedPlural(".DICT.ITEMS.%d", {2}), ui::DownloadState::Present,
+            ui::RowAccessory::Disclosure},
+        {{"bad\xFF\u202Egpj.exe"}, "7 bytes"},
+        {{"Far.pdf", Kind::Document, true}, "2 MB", ui::DownloadState::InCloud, ui::RowAccessory::None, 2},
+        {{"Letter.pages", Kind::Package}, ""},
+        {{"Notes.txt"}, "2 KB"},
+        {{"Ours.txt"}, "3 bytes · Shared"},
+        {{"Pointer", Kind::Link}, "Link"},
+    };
+    HandLister::Entries entries;
+    for (const auto& row : rows)
+        entries.push_back(row.entry);
+    const auto list = shownList(drive.url("Stuff"));
+    deliver(list, entries);
+
+    ASSERT_EQ(list->listView()->rowCount(), std::size(rows));
+    for (std::size_t i = 0; i < std::size(rows); ++i) {
+        SCOPED_TRACE(rows[i].entry.name);
+        const auto shown = list->listView()->row(i);
+        EXPECT_THAT(shown.detail, testing::EndsWith(rows[i].detail));
+        EXPECT_EQ(shown.download, rows[i].download);
+        EXPECT_EQ(shown.accessory, rows[i].accessory);
+        EXPECT_EQ(shown.tagColors.size(), rows[i].dots);
+        EXPECT_TRUE(shown.image.has_value());
+        EXPECT_TRUE(isValidUtf8(shown.title));
+    }
+    EXPECT_EQ(list->listView()->row(1).title, "bad\uFFFD\uFFFDgpj.exe");
+    EXPECT_THAT(list->listView()->row(0).accessibleDescription,
+        testing::AllOf(testing::StartsWith("Trip, Folder, "), HasSubstr(rows[0].detail)));
+    EXPECT_THAT(list->listView()->row(2).accessibleDescription,
+        testing::AllOf(HasSubstr("Far.pdf"), HasSubstr("In the cloud"), HasSubstr("Work")));
+}
+
+TEST_F(DocumentList, ShowsTheLibrariesAtTheTopOfTheDrive)
+{
+    makePaintLibrary();
+    const auto root = DocumentListController::createRootList();
+    ASSERT_TRUE(root);
+    const auto list = shownList(*root->presentedURL());
+    deliver(list, {{"Documents", Kind::Folder}});
+    EXPECT_EQ(titles(list), (Lines{"Paint", "Documents"}));
+    EXPECT_EQ(list->listView()->row(0).image, Image::named("paint-icon"));
+    EXPECT_EQ(list->containedItems().back(), drive.url("Documents"));
+
+    delegate->take();
+    list->listView()->activateRow(0);
+    EXPECT_EQ(delegate->take(), (Lines{"folder Paint Documents"}));
+
+    drive.signOut();
+    drive.settle();
+    EXPECT_FALSE(DocumentListController::createRootList());
+}
+
+TEST_F(DocumentList, ShowsLibrariesThatComeWhileItIsShown)
+{
+    const auto root = DocumentListController::createRootList();
+    const auto list = shownList(*root->presentedURL());
+    deliver(list, {{"Documents", Kind::Folder}});
+    list->setEditingAnimated(true, false);
+    list->setSelectedItems({drive.url("Documents")});
+    EXPECT_EQ(titles(list), (Lines{"Documents"}));
+    makePaintLibrary();
+    lister->deliver(root->presentedURL()->deletingLastPathComponent(), {});
+    deliver(list, {{"Documents", Kind::Folder}});
+    EXPECT_EQ(titles(list), (Lines{"Paint", "Documents"}));
+    EXPECT_EQ(list->selectedItems(), std::vector{drive.url("Documents")});
+    const auto listings = lister->listingsStarted();
+    lister->deliver(root->presentedURL()->deletingLastPathComponent(), {});
+    drive.dispatch->advance(2);
+    EXPECT_EQ(lister->listingsStarted(), listings) << "nothing changed";
+}
+
+TEST_F(DocumentList, ShowsThumbnailsOfPicturesAndMakesThemAnewWhenTheyChange)
+{
+    const auto writePicture = [&](int width, int height, unsigned char shade) {
+        std::string picture = "P5 " + std::to_string(width) + ' ' + std::to_string(height) + " 255\n";
+        picture.append(static_cast<std::size_t>(width * height), static_cast<char>(shade));
+        const auto url = drive.writeDocument("Stuff/photo.pgm", picture);
+        std::filesystem::last_write_time(
+            url.path(), std::filesystem::file_time_type{std::chrono::hours(shade)});
+        // Asked on the main thread, as here, the store makes a thumbnail later and has it from then on.
+        readRowThumbnail(url);
+        drive.dispatch->runUntilIdle();
+    };
+    writePicture(400, 200, 0x40);
+    drive.writeDocument("Stuff/broken.pgm", "no picture");
+    const auto list = shownList(drive.url("Stuff"));
+    const HandLister::Entries entries{{"broken.pgm"}, {"photo.pgm"}, {"To", Kind::Link}};
+    deliver(list, entries);
+    EXPECT_TRUE(list->listView()->row(0).image->isNamed());
+    EXPECT_EQ(list->listView()->row(2).image, Image::named("emblem-symbolic-link"));
+    const auto first = *list->listView()->row(1).image;
+    ASSERT_FALSE(first.isNamed());
+    EXPECT_EQ(first.pixelWidth(), rowThumbnailSide);
+    EXPECT_EQ(first.pixelHeight(), rowThumbnailSide / 2);
+    EXPECT_EQ(first.pixels().front(), 0xff404040U);
+
+    deliver(list, entries);
+    EXPECT_EQ(list->listView()->row(1).image, first) << "not made again while nothing changed";
+
+    writePicture(30, 60, 0x80);
+    deliver(list, entries);
+    const auto second = *list->listView()->row(1).image;
+    EXPECT_EQ(second.pixelHeight(), 60);
+    EXPECT_EQ(second.pixels().back(), 0xff808080U);
+}
+
+TEST_F(DocumentList, ReadsDetailsOfVisibleRowsOnly)
+{
+    const auto list = shownList(drive.makeFolder("Stuff"));
+    const auto all = documents(10'000);
+    lister->deliver(*list->presentedURL(), {all.begin(), all.begin() + 100}, ListingStage::FirstRows);
+    EXPECT_EQ(list->containedItemCount(), 100U);
+    deliver(list, all);
+    EXPECT_EQ(list->containedItemCount(), 10'000U);
+    const auto visible = list->listView()->visibleRows();
+    EXPECT_LT(visible.count, 20U);
+    // The first rows were wanted twice: when they came, and when the list was complete.
+    EXPECT_LE(coordinator->takeReads().size(), 2 * visible.count);
+
+    list->listView()->userScrolled({0, 5000 * list->listView()->rowHeight()});
+    list->listView()->userScrolled({0, 9000 * list->listView()->rowHeight()});
+    drive.dispatch->runUntilIdle();
+    const auto read = coordinator->takeReads();
+    ASSERT_FALSE(read.empty());
+    EXPECT_LT(read.size(), 20U);
+    for (const auto& name : read)
+        EXPECT_GE(name, "item 109000.txt");
+}
+
+TEST_F(DocumentList, ShowsChangedDetailsWithoutTouchingOtherRows)
+{
+    drive.writeDocument("Stuff/a.txt", "1");
+    drive.writeDocument("Stuff/b.txt", "1");
+    const auto list = shownList(drive.url("Stuff"));
+    deliver(list, {{"a.txt"}, {"b.txt"}});
+    const auto observer = std::make_shared<RecordingListObserver>();
+    list->listView()->setListObserver(observer);
+
+    drive.writeDocument("Stuff/b.txt", "12345");
+    lister->deliver(*list->presentedURL(), {{"a.txt"}, {"b.txt"}});
+    EXPECT_THAT(list->listView()->row(1).detail, HasSubstr("1 byte"));
+    drive.dispatch->runUntilIdle();
+    EXPECT_THAT(list->listView()->row(1).detail, HasSubstr("5 bytes"));
+    EXPECT_THAT(observer->changedRows, ElementsAre(1U));
+}
+
+TEST_F(DocumentList, DownloadsADocumentAndShowsHowFarItIs)
+{
+    host::drive::PromiseRecord far;
+    far.size = 4'000'000;
+    far.content = "far";
+    std::filesystem::create_directories(drive.layout().cloud());
+    std::ofstream(drive.layout().cloud() + "/far") << std::string(4'000'000, 'x');
+    drive.writePromise("Stuff/far.txt", far);
+    const auto list = shownList(drive.url("Stuff"));
+    deliver(list, {{"far.txt", Kind::Document, true}, {"here.txt"}});
+    const auto row = [&] { return list->listView()->row(0); };
+    const auto choose = [&](const std::string& title) {
+        ASSERT_EQ(list->listView()->menuForRow(0).front().title, title);
+        list->listView()->menuForRow(0).front().handler();
+    };
+    EXPECT_TRUE(list->listView()->menuForRow(1).empty());
+    choose("Download");
+    EXPECT_EQ(row().download, ui::DownloadState::Downloading);
+    EXPECT_THAT(row().accessibleDescription, HasSubstr("Downloading"));
+    choose("Cancel Download");
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(row().download, ui::DownloadState::InCloud);
+
+    struct Shares : RecordingListObserver {
+        void rowDidChange(ui::ListView& view, std::size_t index) override
+        {
+            shares.push_back(view.row(index).downloadProgress);
+        }
+        std::vector<double> shares;
+    };
+    const auto observer = std::make_shared<Shares>();
+    list->listView()->setListObserver(observer);
+    choose("Download");
+    drive.dispatch->runUntilIdle();
+    EXPECT_THAT(observer->shares, testing::Contains(testing::AllOf(testing::Gt(0.2), testing::Lt(0.9))));
+    EXPECT_TRUE(std::filesystem::exists(drive.url("Stuff/far.txt").path()));
+
+    std::filesystem::remove(drive.url("Stuff/far.txt").path());
+    far.content = "lost";
+    drive.writePromise("Stuff/far.txt", far);
+    choose("Download");
+    drive.dispatch->runUntilIdle();
+    EXPECT_TRUE(std::dynamic_pointer_cast<ui::AlertController>(list->presentedViewController()));
+}
+
+} // namespace

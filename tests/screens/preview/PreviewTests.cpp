@@ -1,0 +1,475 @@
+#include "host/previews/UchardetDecoder.h"
+#include "kit/Button.h"
+#include "kit/Label.h"
+#include "kit/NavigationController.h"
+#include "kit/Screen.h"
+#include "kit/TextField.h"
+#include "screens/preview/PreviewContent.h"
+#include "screens/preview/PreviewController.h"
+#include "screens/preview/PreviewLoader.h"
+#include "screens/preview/PreviewPictureView.h"
+#include "screens/preview/PreviewScreenView.h"
+#include "screens/preview/PreviewSearchBar.h"
+#include "screens/preview/PreviewSummaryView.h"
+#include "screens/preview/PreviewTextView.h"
+#include "screens/preview/PreviewToolbar.h"
+#include "screens/preview/TextDecoding.h"
+#include "tests/screens/support/ComponentsFixture.h"
+#include "tests/support/SimplePdf.h"
+
+#include <gmock/gmock.h>
+#include <sys/stat.h>
+
+#include <filesystem>
+#include <fstream>
+
+using namespace platform;
+using namespace platform::components;
+using testing::HasSubstr;
+using testing_support::ComponentsFixture;
+using Kind = PreviewContent::Kind;
+
+namespace {
+
+/// Shows the documents that the test puts in.
+struct Documents : PreviewControllerDataSource {
+    std::size_t numberOfPreviewItemsInPreviewController(const PreviewController&) const override
+    {
+        return urls.size();
+    }
+    Url previewControllerPreviewItemAtIndex(const PreviewController&, std::size_t index) const override
+    {
+        return urls[index];
+    }
+    std::vector<Url> urls;
+};
+
+class Preview : public ComponentsFixture {
+protected:
+    Preview()
+    {
+        screen->setDataSource(documents);
+        screen->view()->setFrame({0, 0, 360, 600});
+    }
+    void show(std::vector<Url> urls)
+    {
+        documents->urls = std::move(urls);
+        screen->reloadData();
+    }
+    const PreviewSummaryView::Content& summary() const
+    {
+        const auto view = std::dynamic_pointer_cast<PreviewSummaryView>(screen->screenView()->content());
+        static const PreviewSummaryView::Content none;
+        return view ? view->content() : none;
+    }
+
+    std::shared_ptr<Documents> documents = std::make_shared<Documents>();
+    std::shared_ptr<PreviewController> screen = std::make_shared<PreviewController>();
+};
+
+constexpr std::string_view twoPixels = "P6 2 1 255\n\xFF\x80\x01\x02\x03\x04";
+
+struct Row {
+    const char* name;
+    std::string_view content;
+    Kind kind;
+    const char* note; ///< a part of it
+};
+
+TEST_F(Preview, ChoosesWhatToShowByTheDocument)
+{
+    const auto secret = testing_support::passwordPdf(), plan = testing_support::simplePdf({"one", "two"});
+    const Row rows[] = {
+        {"Good.pdf", plan, Kind::Pages, ""},
+        {"Picture.png", twoPixels, Kind::Image, ""},
+        {"Broken.png", "no picture at all", Kind::Failure, "damaged"},
+        {"Notes.txt", "Hello", Kind::Text, ""},
+        {"Empty.txt", "", Kind::Text, "empty"},
+        {"Plan.pdf", "%PDF-1.4", Kind::Failure, "damaged"},
+        {"Secret.pdf", secret, Kind::Failure, "password"},
+        {"Song.wav", "RIFF", Kind::Sound, "4 bytes"},
+        {"Film.mp4", "ftyp", Kind::Film, "4 bytes"},
+        {"Unknown.xyz", "bytes", Kind::Summary, "5 bytes"},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        show({drive.writeDocument(row.name, row.content)});
+        EXPECT_FALSE(screen->content());
+        drive.dispatch->runUntilIdle();
+        ASSERT_TRUE(screen->content());
+        EXPECT_EQ(screen->content()->kind, row.kind);
+        EXPECT_EQ(screen->title(), row.name);
+        EXPECT_THAT(screen->content()->note, HasSubstr(row.note));
+    }
+}
+
+TEST_F(Preview, SaysWhyADocumentCannotBeShown)
+{
+    show({drive.url("Gone.txt")});
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->kind, Kind::Failure);
+    EXPECT_FALSE(summary().message.empty());
+
+    show({drive.writePromise("Far.txt", {})});
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->kind, Kind::InCloud);
+    EXPECT_THAT(summary().message, HasSubstr("in the cloud"));
+    EXPECT_FALSE(std::filesystem::exists(drive.url("Far.txt").path()));
+
+    // A pipe would keep a reader waiting for ever.
+    ASSERT_EQ(::mkfifo(drive.url("Pipe.txt").path().c_str(), 0600), 0);
+    show({drive.url("Pipe.txt")});
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->kind, Kind::Summary);
+
+    show({});
+    EXPECT_EQ(summary().title, "Nothing to show");
+}
+
+TEST_F(Preview, CutsLongTextsAndSaysSo)
+{
+    const PreviewLimits limits;
+    std::string text(limits.maxTextBytes - 1, 'x');
+    for (std::size_t line = 100; line < text.size(); line += 100)
+        text[line] = '\n';
+    drive.writeDocument("Fits.txt", text + "y");
+    drive.writeDocument("Long.txt", text + "\xC3\xA4 and more");
+    const auto whole = loadPreview(drive.url("Fits.txt"), limits);
+    EXPECT_EQ(whole.text.size(), limits.maxTextBytes);
+    EXPECT_EQ(whole.note, "");
+    const auto cut = loadPreview(drive.url("Long.txt"), limits);
+    EXPECT_EQ(cut.text.size(), limits.maxTextBytes - 1);
+    EXPECT_THAT(cut.note, HasSubstr("Only the beginning"));
+
+    const auto lines = loadPreview(
+        drive.writeDocument("Line.txt", "short\n" + std::string(limits.maxLineBytes + 1, 'x') + "\nend"),
+        limits);
+    EXPECT_THAT(lines.text, testing::EndsWith("x…\nend"));
+    EXPECT_THAT(lines.note, HasSubstr("very long lines"));
+
+    show({drive.url("Long.txt")});
+    drive.dispatch->runUntilIdle();
+    screen->view()->layoutIfNeeded();
+    EXPECT_EQ(screen->screenView()->note(), cut.note);
+    const auto place = screen->previewView()->frame();
+    EXPECT_GT(place.y, 0);
+    EXPECT_EQ(place.maxY(), 600 - PreviewToolbar::barHeight);
+    EXPECT_EQ(place.width, 360);
+}
+
+TEST_F(Preview, ReadsNoMorePixelsThanAreSeen)
+{
+    ui::Screen::setMain(ui::Screen{{0, 0, 10, 5}, 2, ui::UserInterfaceIdiom::Phone, {}});
+    std::string picture = "P6 100 100 255\n";
+    picture.append(30'000, 'z');
+    show({drive.writeDocument("Large.png", picture)});
+    drive.dispatch->runUntilIdle();
+    const auto view = std::dynamic_pointer_cast<PreviewPictureView>(screen->previewView());
+    ASSERT_TRUE(view);
+    EXPECT_EQ(view->picture().frames.front().image.pixelHeight(), 10);
+    // Seen closer, it is read once more.
+    view->userSeesPixels(11);
+    view->userSeesPixels(50);
+    drive.dispatch->runUntilIdle();
+    ui::Screen::setMain(std::nullopt);
+    EXPECT_EQ(screen->previewView(), view);
+    EXPECT_EQ(view->picture().frames.front().image.pixelHeight(), 100);
+}
+
+TEST_F(Preview, IgnoresWhatArrivesForAnEarlierDocument)
+{
+    const auto first = drive.writeDocument("First.txt", "first");
+    const auto second = drive.writeDocument("Second.txt", "second");
+    show({first});
+    show({second});
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->text, "second");
+    EXPECT_EQ(screen->currentPreviewItem(), second);
+
+    drive.writeDocument("Second.txt", "second, changed");
+    screen->refreshCurrentPreviewItem();
+    EXPECT_EQ(screen->content()->text, "second");
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->text, "second, changed");
+}
+
+TEST_F(Preview, ShowsThatItIsLoadingOnlyAfterAWhile)
+{
+    const auto late = std::make_shared<PreviewController>();
+    documents->urls = {drive.writeDocument("Notes.txt", "Hello")};
+    late->setDataSource(documents);
+    late->reloadData();
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(late->view()->frame().width, 0);
+    const auto text = std::dynamic_pointer_cast<PreviewTextView>(late->screenView()->content());
+    ASSERT_TRUE(text);
+    EXPECT_EQ(text->text().text, "Hello");
+    drive.dispatch->advance(1);
+    EXPECT_EQ(late->screenView()->content(), text);
+}
+
+/// The buttons that are offered below what the screen says.
+std::vector<std::string> offers(const PreviewController& screen)
+{
+    std::vector<std::string> titles;
+    const auto view = std::dynamic_pointer_cast<PreviewSummaryView>(screen.screenView()->content());
+    for (const auto& button : view ? view->buttons() : std::vector<std::shared_ptr<ui::Button>>())
+        titles.push_back(button->title());
+    return titles;
+}
+
+void press(const PreviewController& screen)
+{
+    const auto view = std::dynamic_pointer_cast<PreviewSummaryView>(screen.screenView()->content());
+    const auto button = view->buttons().front();
+    button->press();
+}
+
+class Download : public Preview {
+protected:
+    Download()
+    {
+        host::drive::PromiseRecord promise;
+        promise.size = 5;
+        promise.content = "content";
+        far = drive.writePromise("Far.txt", promise);
+        std::filesystem::create_directories(drive.layout().cloud());
+    }
+    void putContent() const { std::ofstream(drive.layout().cloud() + "/content") << "Hello"; }
+    void appear() const
+    {
+        screen->beginAppearance(true, false);
+        screen->endAppearance();
+    }
+    std::optional<Url> far;
+};
+
+TEST_F(Download, BeginsWhenThePersonHasComeToTheDocument)
+{
+    putContent();
+    show({*far});
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->kind, Kind::InCloud);
+    EXPECT_THAT(offers(*screen), testing::ElementsAre("Download"));
+
+    appear();
+    EXPECT_TRUE(screen->isDownloading());
+    EXPECT_THAT(summary().message, HasSubstr("Downloading"));
+    EXPECT_THAT(offers(*screen), testing::ElementsAre("Cancel"));
+    drive.dispatch->runUntilIdle();
+    EXPECT_FALSE(screen->isDownloading());
+    EXPECT_EQ(screen->content()->text, "Hello");
+}
+
+TEST_F(Download, CanBeStoppedAndBegunAgain)
+{
+    putContent();
+    show({*far});
+    drive.dispatch->runUntilIdle();
+    appear();
+    press(*screen);
+    drive.dispatch->runUntilIdle();
+    EXPECT_FALSE(std::filesystem::exists(far->path()));
+    EXPECT_THAT(summary().message, HasSubstr("in the cloud"));
+    // A change that is heard of does not begin what was stopped.
+    screen->refreshCurrentPreviewItem();
+    drive.dispatch->runUntilIdle();
+    EXPECT_FALSE(screen->isDownloading());
+    press(*screen);
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->kind, Kind::Text);
+}
+
+TEST_F(Download, SaysWhyItFailedAndTriesAgain)
+{
+    show({*far});
+    appear();
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->kind, Kind::Failure);
+    EXPECT_THAT(summary().message, HasSubstr("could not be downloaded"));
+    EXPECT_THAT(offers(*screen), testing::ElementsAre("Try Again"));
+    putContent();
+    press(*screen);
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->text, "Hello");
+}
+
+TEST_F(Download, EndsWhenTheScreenIsLeft)
+{
+    putContent();
+    show({*far});
+    drive.dispatch->runUntilIdle();
+    appear();
+    screen->beginAppearance(false, false);
+    screen->endAppearance();
+    drive.dispatch->runUntilIdle();
+    EXPECT_FALSE(std::filesystem::exists(far->path()));
+    EXPECT_FALSE(screen->content());
+    // Whoever comes back sees it again.
+    appear();
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->content()->text, "Hello");
+}
+
+TEST_F(Download, EndsWhenThePersonGoesBack)
+{
+    putContent();
+    show({*far});
+    drive.dispatch->runUntilIdle();
+    const auto stack = std::make_shared<ui::NavigationController>();
+    const auto list = std::make_shared<ui::ViewController>();
+    stack->setViewControllers({list, screen}, false);
+    stack->beginAppearance(true, false);
+    stack->endAppearance();
+    EXPECT_TRUE(screen->isDownloading());
+    // Under another screen it goes on.
+    stack->pushViewController(std::make_shared<ui::ViewController>(), false);
+    EXPECT_TRUE(screen->isDownloading());
+    stack->setViewControllers({list}, false);
+    EXPECT_FALSE(screen->isDownloading());
+    drive.dispatch->runUntilIdle();
+    EXPECT_FALSE(std::filesystem::exists(far->path()));
+}
+
+TEST_F(Preview, OffersToOpenElsewhereWhatItCannotShow)
+{
+    show({drive.writeDocument("Data.bin", "bytes")});
+    drive.dispatch->runUntilIdle();
+    EXPECT_TRUE(offers(*screen).empty());
+    std::vector<Url> opened;
+    screen->setOpenInHandler([&](const Url& item, const auto& from) {
+        EXPECT_TRUE(from);
+        opened.push_back(item);
+    });
+    ASSERT_THAT(offers(*screen), testing::ElementsAre("Open in…"));
+    press(*screen);
+    EXPECT_EQ(opened, std::vector<Url>{drive.url("Data.bin")});
+}
+
+TEST_F(Preview, KeepsTheViewWhileADocumentIsDamagedForAWhile)
+{
+    const auto url = drive.writeDocument("Plan.pdf", testing_support::simplePdf({"one", "two"}));
+    show({url});
+    drive.dispatch->runUntilIdle();
+    const auto view = screen->previewView();
+    view->setZoom(3);
+    drive.writeDocument("Plan.pdf", "%PDF");
+    screen->refreshCurrentPreviewItem();
+    drive.dispatch->runUntilIdle();
+    EXPECT_THAT(summary().message, HasSubstr("damaged"));
+    EXPECT_TRUE(screen->screenView()->toolbar()->isHidden());
+    drive.writeDocument("Plan.pdf", testing_support::simplePdf({"one", "two", "three"}));
+    screen->refreshCurrentPreviewItem();
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(screen->screenView()->content(), view);
+    EXPECT_EQ(view->zoom(), 3);
+    EXPECT_EQ(screen->screenView()->toolbar()->pageLabel()->text(), "1 of 3");
+}
+
+TEST_F(Preview, SearchesFromItsBar)
+{
+    show({drive.writeDocument("Plan.pdf", testing_support::simplePdf({"hay", "needle"}))});
+    drive.dispatch->runUntilIdle();
+    screen->view()->layoutIfNeeded();
+    const auto& bars = *screen->screenView();
+    ASSERT_TRUE(bars.toolbar()->findButton()->press());
+    EXPECT_TRUE(bars.isSearching());
+    EXPECT_FALSE(bars.searchBar()->nextButton()->press());
+    bars.searchBar()->field()->userEdited("need", {4, 0});
+    bars.searchBar()->field()->userEdited("needle", {6, 0});
+    drive.dispatch->advance(1);
+    EXPECT_EQ(bars.searchBar()->countLabel()->text(), "1 of 1");
+    EXPECT_TRUE(bars.searchBar()->nextButton()->press());
+    // The back key leaves the search first, then the screen.
+    EXPECT_TRUE(screen->backRequested());
+    EXPECT_FALSE(bars.isSearching());
+    EXPECT_EQ(screen->previewView()->query(), "");
+    EXPECT_FALSE(screen->backRequested());
+}
+
+struct TextRow {
+    const char* name;
+    std::string_view bytes;
+    TextEnd end;
+    const char* text;
+};
+
+TEST(TextDecoding, UnderstandsTheUsualEncodings)
+{
+    using namespace std::string_view_literals;
+    const TextRow rows[] = {
+        {"UTF-8", "Gr\xC3\xBC\xC3\x9F", TextEnd::Whole, "Grüß"},
+        {"UTF-8 with mark", "\xEF\xBB\xBFhi", TextEnd::Whole, "hi"},
+        {"Latin-1", "Gr\xFC\xDF", TextEnd::Whole, "Grüß"},
+        {"UTF-16 little-endian", "\xFF\xFEh\0\xFC\0"sv, TextEnd::Whole, "hü"},
+        {"UTF-16 big-endian, beyond the first plane", "\xFE\xFF\xD8\x3D\xDE\x00"sv, TextEnd::Whole, "😀"},
+        {"UTF-16 without a mark", "h\0e\0y\0\n\0"sv, TextEnd::Whole, "hey\n"},
+        {"UTF-32 little-endian", "\xFF\xFE\0\0\xFC\0\0\0"sv, TextEnd::Whole, "ü"},
+        {"UTF-32 big-endian, no character", "\0\0\xFE\xFF\0\x11\0\0"sv, TextEnd::Whole, "\uFFFD"},
+        {"Windows-1252", "\x93q\x94 \x80", TextEnd::Whole, "“q” €"},
+        {"Shift-JIS",
+            "\223\214\213\236\202\251\202\347\213\236\223s\202\334\202\305\220V\212\262\220\374\202\305\223"
+            "\361\216\236\212\324\201B",
+            TextEnd::Whole, "東京から京都まで新幹線で二時間。"},
+        {"EUC-JP",
+            "\305\354\265\376\244\253\244\351\265\376\305\324\244\336\244\307\277\267\264\264\300\376\244\307"
+            "\306\363\273\376\264\326\241\243",
+            TextEnd::Whole, "東京から京都まで新幹線で二時間。"},
+        {"ISO-2022-JP", "\033$BEl5~$+$i5~ET$^$G!#\033(B", TextEnd::Whole, "東京から京都まで。"},
+        {"EUC-KR",
+            "\274\255\277\357\277\241\274\255 \272\316\273\352\261\356\301\366 \261\342\302\367\267\316 "
+            "\274\274 \275\303\260\243\300\324\264\317\264\331.",
+            TextEnd::Whole, "서울에서 부산까지 기차로 세 시간입니다."},
+        {"GB18030",
+            "\264\323\261\261\276\251\265\275\311\317\272\243\327\370\270\337\314\372\322\252\316\345\270\366"
+            "\320\241\312\261\241\243",
+            TextEnd::Whole, "从北京到上海坐高铁要五个小时。"},
+        {"Big5",
+            "\261q\245x\245_"
+            "\250\354\260\252\266\257\247\244\260\252\305K\255n\250\342\255\323\244p\256\311\241C",
+            TextEnd::Whole, "從台北到高雄坐高鐵要兩個小時。"},
+        {"KOI8-R", "\372\301\315\305\324\313\311 \317 \320\317\305\332\304\313\305", TextEnd::Whole,
+            "Заметки о поездке"},
+        {"Windows-1251", "\307\340\354\345\362\352\350 \356 \357\356\345\347\344\352\345", TextEnd::Whole,
+            "Заметки о поездке"},
+        {"IBM866",
+            "\217\256\245\247\244 \250\247 \214\256\341\252\242\353 \250\244\361\342 "
+            "\347\245\342\353\340\245 \347\240\341\240.",
+            TextEnd::Whole, "Поезд из Москвы идёт четыре часа."},
+        {"Windows-1250",
+            "P\370\355li\232 \236lu\235ou\350k\375 k\371\362 \372p\354l \357\341belsk\351 \363dy.",
+            TextEnd::Whole, "Příliš žluťoučký kůň úpěl ďábelské ódy."},
+        {"Windows-1253",
+            "\324\357 \364\361\335\355\357 \341\360\374 \364\347\355 \301\350\336\355\341 "
+            "\352\334\355\345\351 \360\335\355\364\345 \376\361\345\362.",
+            TextEnd::Whole, "Το τρένο από την Αθήνα κάνει πέντε ώρες."},
+        {"Windows-1255",
+            "\344\370\353\341\372 \356\372\354 \340\341\351\341 \354\351\370\345\371\354\351\355 "
+            "\360\345\361\362\372 \371\362\344.",
+            TextEnd::Whole, "הרכבת מתל אביב לירושלים נוסעת שעה."},
+        {"Windows-1256",
+            "\307\341\336\330\307\321 \343\344 \307\341\336\307\345\321\311 \355\323\312\333\321\336 "
+            "\323\307\332\312\355\344.",
+            TextEnd::Whole, "القطار من القاهرة يستغرق ساعتين."},
+        {"Shift-JIS cut within a character",
+            "\223\214\213\236\202\251\202\347\213\236\223s\202\334\202\305\220V\212\262\220\374\202\305\223"
+            "\361\216\236\212",
+            TextEnd::Cut, "東京から京都まで新幹線で二時"},
+        {"UTF-16 with a lone surrogate", "\xFE\xFF\xDE\x00\0a"sv, TextEnd::Whole, "\uFFFDa"},
+        {"UTF-16 with half a unit", "\xFF\xFEh\0i"sv, TextEnd::Whole, "h"},
+        {"UTF-8 cut within a character", "ab\xE2\x82", TextEnd::Cut, "ab"},
+        {"UTF-8 cut between characters", "ab\xE2\x82\xAC", TextEnd::Cut, "ab€"},
+        {"UTF-16 cut within a pair", "\xFE\xFF\0a\xD8\x3D"sv, TextEnd::Cut, "a"},
+        {"whole, with the end of a character missing", "ab\xE2\x82", TextEnd::Whole, "abâ‚"},
+        {"NUL characters", "a\0b"sv, TextEnd::Whole, "ab"},
+        {"nothing", "", TextEnd::Cut, ""},
+    };
+    const host::previews::UchardetDecoder older;
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        EXPECT_EQ(decodedText(row.bytes, row.end, older), row.text);
+        EXPECT_TRUE(isValidUtf8(decodedText(row.bytes, row.end, older)));
+    }
+}
+
+} // namespace

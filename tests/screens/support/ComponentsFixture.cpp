@@ -1,0 +1,151 @@
+#include "tests/screens/support/ComponentsFixture.h"
+
+#include "host/system/MimeTypeRegistry.h"
+#include "host/system/ThreadedFolderLister.h"
+#include "kit/ListView.h"
+
+#include <chrono>
+#include <utility>
+
+namespace testing_support {
+
+using platform::Url;
+using platform::components::DocumentListController;
+
+namespace {
+
+/// A service of a set that somebody else keeps.
+template <typename T>
+std::shared_ptr<T> borrowed(T& service)
+{
+    return std::shared_ptr<T>(std::shared_ptr<void>(), &service);
+}
+
+} // namespace
+
+std::optional<platform::Error> CountingCoordinator::coordinateReading(
+    const Url& url, platform::ReadingOptions options, const Accessor& accessor)
+{
+    _names.push_back(url.lastPathComponent());
+    return _real.coordinateReading(url, options, accessor);
+}
+
+std::vector<std::string> CountingCoordinator::takeReads()
+{
+    return std::exchange(_names, {});
+}
+
+void RecordingListDelegate::documentListControllerDidSelectContainerWithViewController(
+    const List&, const List& container)
+{
+    _lines.push_back("folder " + container->title() + " " + container->presentedURL()->lastPathComponent());
+}
+
+void RecordingListDelegate::documentListControllerDidSelectItemAtURL(const List&, const Url& url)
+{
+    _lines.push_back("item " + url.lastPathComponent());
+}
+
+void RecordingListDelegate::documentListControllerItemsChanged(const List& list)
+{
+    _lines.push_back("changed " + std::to_string(list->containedItemCount()) + " selected "
+        + std::to_string(list->selectedItemCount()));
+}
+
+void RecordingListDelegate::documentListControllerURLWasRemoved(const List& list)
+{
+    _lines.push_back("removed " + list->title());
+}
+
+void RecordingListDelegate::documentListControllerPerformActionURLOriginatingViewCompletion(
+    const List&, int action, const Url& url, const std::shared_ptr<platform::ui::View>&, const Completion&)
+{
+    _lines.push_back("action " + std::to_string(action) + " " + url.lastPathComponent());
+}
+
+void RecordingListDelegate::documentListControllerRequestsEditing(const List& list)
+{
+    _lines.push_back("wants to select");
+    if (allowsEditing)
+        list->setEditingAnimated(true, false);
+}
+
+std::vector<std::string> RecordingListDelegate::take()
+{
+    return std::exchange(_lines, {});
+}
+
+ComponentsFixture::ComponentsFixture()
+{
+    coordinator = std::make_shared<CountingCoordinator>(_driveServices.fileCoordinator());
+    _set.activityHandOver = drive.handOver;
+    _set.appRegistry = apps;
+    _set.characterData = borrowed(_driveServices.characterData());
+    _set.cloudDocumentService = drive.cloud;
+    _set.documentSharing = sharing;
+    _set.dispatch = drive.dispatch;
+    _set.fileCoordinator = coordinator;
+    _set.fileSystem = borrowed(_driveServices.fileSystem());
+    _set.folderLister = lister;
+    _set.formatters = borrowed(_driveServices.formatters());
+    _set.imageLoader = borrowed(_driveServices.imageLoader());
+    _set.linkOpener = links;
+    _set.localization = borrowed(_driveServices.localization());
+    _set.nameSearch = borrowed(_driveServices.nameSearch());
+    _set.notificationCenter = drive.notifications;
+    _set.pagedDocumentOpener = borrowed(_driveServices.pagedDocumentOpener());
+    _set.textDecoder = borrowed(_driveServices.textDecoder());
+    _set.previewSupport = borrowed(_driveServices.previewSupport());
+    _set.storageOfferManager = borrowed(_driveServices.storageOfferManager());
+    _set.typeRegistry = borrowed(_driveServices.typeRegistry());
+    _set.keyedArchiver = borrowed(_driveServices.keyedArchiver());
+    _set.userDefaults = borrowed(_driveServices.userDefaults());
+    platform::installServices(_set);
+}
+
+void ComponentsFixture::useRealLister()
+{
+    static const auto types = std::make_shared<const host::system::MimeTypeRegistry>();
+    _set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(drive.dispatch, types, "en_US");
+    platform::installServices(_set);
+}
+
+bool ComponentsFixture::waitUntil(const std::function<bool()>& condition)
+{
+    const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(60);
+    while (!condition()) {
+        if (std::chrono::steady_clock::now() > deadline)
+            return false;
+        drive.settle();
+        drive.dispatch->advance(0.01);
+    }
+    return true;
+}
+
+ComponentsFixture::List ComponentsFixture::shownList(const Url& folder)
+{
+    const auto list = DocumentListController::initWithURL(folder);
+    list->setDelegate(delegate);
+    list->view()->setFrame({0, 0, 360, 600});
+    list->view()->layoutIfNeeded();
+    list->beginAppearance(true, false);
+    list->endAppearance();
+    return list;
+}
+
+void ComponentsFixture::deliver(
+    const List& list, const HandLister::Entries& entries, platform::ListingStage stage)
+{
+    lister->deliver(*list->presentedURL(), entries, stage);
+    drive.dispatch->runUntilIdle();
+}
+
+std::vector<std::string> ComponentsFixture::titles(const List& list) const
+{
+    std::vector<std::string> found;
+    for (std::size_t row = 0; row < list->listView()->rowCount(); ++row)
+        found.push_back(list->listView()->row(row).title);
+    return found;
+}
+
+} // namespace testing_support

@@ -1,0 +1,137 @@
+#pragma once
+
+#include "platform/FileCoordinator.h"
+#include "platform/LinkOpener.h"
+#include "platform/Services.h"
+#include "screens/list/DocumentListController.h"
+#include "screens/list/DocumentListControllerDelegate.h"
+#include "tests/screens/support/HandLister.h"
+#include "tests/support/DriveFixture.h"
+#include "tests/support/RecordingSharing.h"
+#include "tests/support/SimulatedApps.h"
+
+#include <gtest/gtest.h>
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace testing_support {
+
+/// Counts the reads of the coordinator that it stands before.
+class CountingCoordinator : public platform::FileCoordinator {
+public:
+    explicit CountingCoordinator(platform::FileCoordinator& real)
+        : _real(real)
+    {
+    }
+    std::optional<platform::Error> coordinateReading(
+        const platform::Url& url, platform::ReadingOptions options, const Accessor& accessor) override;
+    std::optional<platform::Error> coordinateWriting(
+        const platform::Url& url, platform::WritingOptions options, const Accessor& accessor) override
+    {
+        return _real.coordinateWriting(url, options, accessor);
+    }
+    std::optional<platform::Error> coordinateWriting(const platform::Url& first,
+        platform::WritingOptions firstOptions, const platform::Url& second,
+        platform::WritingOptions secondOptions, const PairAccessor& accessor) override
+    {
+        return _real.coordinateWriting(first, firstOptions, second, secondOptions, accessor);
+    }
+    void itemWillMove(const platform::Url& from, const platform::Url& to) override
+    {
+        _real.itemWillMove(from, to);
+    }
+    void itemDidMove(const platform::Url& from, const platform::Url& to) override
+    {
+        _real.itemDidMove(from, to);
+    }
+    void addFilePresenter(const std::shared_ptr<platform::FilePresenter>& presenter) override
+    {
+        _real.addFilePresenter(presenter);
+    }
+    void removeFilePresenter(const platform::FilePresenter& presenter) override
+    {
+        _real.removeFilePresenter(presenter);
+    }
+    std::vector<std::string> takeReads();
+
+private:
+    platform::FileCoordinator& _real;
+    std::vector<std::string> _names;
+};
+
+class RecordingLinks : public platform::LinkOpener {
+public:
+    void openLink(const std::string& url, Completion completion) override
+    {
+        opened.push_back(url);
+        completion(answer);
+    }
+    std::vector<std::string> opened;
+    std::optional<platform::Error> answer;
+};
+
+/// Writes down what a folder list reports, one line each.
+class RecordingListDelegate : public platform::components::DocumentListControllerDelegate {
+public:
+    void documentListControllerDidSelectContainerWithViewController(
+        const List& list, const List& container) override;
+    void documentListControllerDidSelectItemAtURL(const List& list, const platform::Url& url) override;
+    void documentListControllerItemsChanged(const List& list) override;
+    void documentListControllerURLWasRemoved(const List& list) override;
+    void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,
+        const platform::Url& url, const std::shared_ptr<platform::ui::View>& view,
+        const Completion& completion) override;
+
+    void documentListControllerRequestsEditing(const List& list) override;
+    std::shared_ptr<platform::ui::ViewController> documentListControllerViewControllerForPreviewingItemAtURL(
+        const List&, const platform::Url&) override
+    {
+        return preview;
+    }
+
+    std::vector<std::string> take();
+
+    std::shared_ptr<platform::ui::ViewController> preview; ///< what a peek shows
+    bool allowsEditing = false;
+
+private:
+    std::vector<std::string> _lines;
+};
+
+/// The platform's screens on a real drive in a temporary folder; the listings alone come
+/// from the test, unless it asks for the real ones.
+class ComponentsFixture : public testing::Test {
+protected:
+    using List = std::shared_ptr<platform::components::DocumentListController>;
+
+    ComponentsFixture();
+
+    /// A list of a folder with a size for about ten rows, loaded, shown and watched by `delegate`.
+    List shownList(const platform::Url& folder);
+    void deliver(const List& list, const HandLister::Entries& entries,
+        platform::ListingStage stage = platform::ListingStage::Complete);
+    std::vector<std::string> titles(const List& list) const;
+
+    /// Lists from now on come from the disk, and follow it.
+    void useRealLister();
+    /// Lets the kernel's notices and the virtual clock run until the condition holds; false when it never
+    /// does.
+    bool waitUntil(const std::function<bool()>& condition);
+
+    DriveFixture drive;
+    std::shared_ptr<HandLister> lister = std::make_shared<HandLister>();
+    std::shared_ptr<RecordingLinks> links = std::make_shared<RecordingLinks>();
+    std::shared_ptr<RecordingSharing> sharing = std::make_shared<RecordingSharing>();
+    std::shared_ptr<SimulatedApps> apps = std::make_shared<SimulatedApps>();
+    std::shared_ptr<CountingCoordinator> coordinator;
+    std::shared_ptr<RecordingListDelegate> delegate = std::make_shared<RecordingListDelegate>();
+
+private:
+    platform::Services _driveServices = platform::services();
+    platform::ServiceSet _set;
+};
+
+} // namespace testing_support

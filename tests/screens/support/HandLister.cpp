@@ -1,0 +1,62 @@
+#include "tests/screens/support/HandLister.h"
+
+#include <utility>
+
+namespace testing_support {
+
+using platform::FolderSnapshot;
+using platform::ListingStage;
+using platform::Url;
+
+struct HandLister::Listing : platform::FolderListing {
+    Listing(Url listed, std::vector<FolderSnapshot::ExtraItem> items, Update callback)
+        : folder(std::move(listed))
+        , extraItems(std::move(items))
+        , update(std::move(callback))
+    {
+    }
+    void refresh() override { }
+
+    Url folder;
+    std::vector<FolderSnapshot::ExtraItem> extraItems;
+    Update update;
+};
+
+std::shared_ptr<platform::FolderListing> HandLister::list(const Url& folder,
+    std::vector<FolderSnapshot::ExtraItem> extraItems, platform::FolderGrouping grouping, Update update)
+{
+    _grouping = grouping;
+    auto listing = std::make_shared<Listing>(folder, std::move(extraItems), std::move(update));
+    _listings.push_back(listing);
+    return listing;
+}
+
+void HandLister::deliver(const Url& folder, const Entries& entries, ListingStage stage) const
+{
+    send(folder, entries, stage, std::nullopt);
+}
+
+void HandLister::fail(const Url& folder, const platform::Error& error) const
+{
+    send(folder, {}, ListingStage::Failed, error);
+}
+
+void HandLister::send(
+    const Url& folder, const Entries& entries, ListingStage stage, std::optional<platform::Error> error) const
+{
+    std::shared_ptr<Listing> latest;
+    for (const auto& weak : _listings) {
+        if (const auto listing = weak.lock(); listing && listing->folder == folder)
+            latest = listing;
+    }
+    if (!latest)
+        return;
+    FolderSnapshot::Builder builder(folder);
+    for (const auto& item : latest->extraItems)
+        builder.append(item);
+    for (const auto& entry : entries)
+        builder.append(entry.name, entry.kind, entry.isPromise);
+    latest->update(builder.finish(stage, std::move(error)));
+}
+
+} // namespace testing_support
