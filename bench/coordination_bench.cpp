@@ -1,8 +1,8 @@
 // A move through coordination that nobody else asks for, beside the bare rename. What coordination costs is
 // the difference: at most 20 microseconds are fine.
 
-#include "host/system/GLibDispatch.h"
-#include "host/system/LocalFileCoordinator.h"
+#include "host/system/coordination/LocalFileCoordinator.h"
+#include "host/system/queues/GLibDispatch.h"
 #include "platform/FilePresenter.h"
 
 #include <benchmark/benchmark.h>

@@ -4,7 +4,7 @@
 
 #include "host/drive/ItemFacts.h"
 #include "host/drive/LocalDocumentIdentifiers.h"
-#include "host/system/GLibDispatch.h"
+#include "host/system/queues/GLibDispatch.h"
 
 #include <fcntl.h>
 #include <sqlite3.h>

@@ -5,11 +5,11 @@
 // The folder is made under TMPDIR (/tmp). Run on an idle machine; the list uses all cores, the floor one.
 
 #include "ListedFolders.h"
-#include "host/system/DirectoryReader.h"
-#include "host/system/EntryClassifier.h"
-#include "host/system/GLibDispatch.h"
-#include "host/system/NameOrder.h"
-#include "host/system/ThreadedFolderLister.h"
+#include "host/system/files/DirectoryReader.h"
+#include "host/system/listing/EntryClassifier.h"
+#include "host/system/listing/NameOrder.h"
+#include "host/system/listing/ThreadedFolderLister.h"
+#include "host/system/queues/GLibDispatch.h"
 
 #include <benchmark/benchmark.h>
 #include <glib.h>

@@ -6,10 +6,10 @@
 // 100,000 items in other orders is measured, too: its items are looked at once, not with every change.
 
 #include "ListedFolders.h"
-#include "host/system/GLibDispatch.h"
-#include "host/system/MimeTypeRegistry.h"
-#include "host/system/PosixFileSystem.h"
-#include "host/system/ThreadedFolderLister.h"
+#include "host/system/desktop/MimeTypeRegistry.h"
+#include "host/system/files/PosixFileSystem.h"
+#include "host/system/listing/ThreadedFolderLister.h"
+#include "host/system/queues/GLibDispatch.h"
 #include "platform/Services.h"
 #include "screens/list/FolderContents.h"
 

@@ -3,12 +3,12 @@
 
 #include "host/drive/LocalCloudDocumentService.h"
 #include "host/drive/PromiseRecord.h"
-#include "host/system/GLibDispatch.h"
-#include "host/system/IcuFormatters.h"
-#include "host/system/LocalFileCoordinator.h"
-#include "host/system/MimeTypeRegistry.h"
-#include "host/system/PosixFileSystem.h"
-#include "host/system/TypePreviewSupport.h"
+#include "host/system/coordination/LocalFileCoordinator.h"
+#include "host/system/desktop/MimeTypeRegistry.h"
+#include "host/system/desktop/TypePreviewSupport.h"
+#include "host/system/files/PosixFileSystem.h"
+#include "host/system/queues/GLibDispatch.h"
+#include "host/system/texts/IcuFormatters.h"
 #include "items/DRItem.h"
 #include "platform/NotificationCenter.h"
 

@@ -5,9 +5,9 @@
 // "gathering" reads the names of a real tree of 100,000 items (made under TMPDIR) and brings an index of it
 // up to date where nothing changed; its floor is a walk that reads the same folders and keeps nothing.
 
-#include "host/system/DirectoryReader.h"
-#include "host/system/MimeTypeRegistry.h"
-#include "host/system/NameGathering.h"
+#include "host/system/desktop/MimeTypeRegistry.h"
+#include "host/system/files/DirectoryReader.h"
+#include "host/system/search/NameGathering.h"
 
 #include <benchmark/benchmark.h>
 

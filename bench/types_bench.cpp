@@ -1,4 +1,4 @@
-#include "host/system/EntryClassifier.h"
+#include "host/system/listing/EntryClassifier.h"
 
 #include <benchmark/benchmark.h>
 #include <gio/gio.h>

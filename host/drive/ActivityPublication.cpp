@@ -3,7 +3,7 @@
 #include "host/drive/AccountRecord.h"
 #include "host/drive/ActivityRecord.h"
 #include "host/drive/DeviceIdentity.h"
-#include "host/system/AtomicWrite.h"
+#include "host/system/files/AtomicWrite.h"
 #include "platform/Log.h"
 
 #include <sys/stat.h>

@@ -1,7 +1,7 @@
 #include "host/drive/ActivityRecord.h"
 
 #include "host/drive/JsonObject.h"
-#include "host/system/JsonFile.h"
+#include "host/system/files/JsonFile.h"
 
 #include <algorithm>
 

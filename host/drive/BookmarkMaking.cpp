@@ -5,7 +5,7 @@
 #include "host/drive/LinkRecords.h"
 #include "host/drive/RealPath.h"
 #include "host/drive/SmallFile.h"
-#include "host/system/Translate.h"
+#include "host/system/texts/Translate.h"
 
 #include <string_view>
 

@@ -2,7 +2,7 @@
 
 #include "host/drive/ActivityRecord.h"
 #include "host/drive/SmallFile.h"
-#include "host/system/AtomicWrite.h"
+#include "host/system/files/AtomicWrite.h"
 #include "platform/Log.h"
 
 #include <glib.h>

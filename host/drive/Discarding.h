@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/system/FileDescriptor.h"
+#include "host/system/files/FileDescriptor.h"
 
 #include <string>
 

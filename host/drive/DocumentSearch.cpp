@@ -5,7 +5,7 @@
 #include "host/drive/PromiseRecord.h"
 #include "host/drive/SmallFile.h"
 #include "host/drive/WorkRecord.h"
-#include "host/system/DeepEnumeration.h"
+#include "host/system/files/DeepEnumeration.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>

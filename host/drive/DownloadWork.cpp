@@ -5,8 +5,8 @@
 #include "host/drive/NewFile.h"
 #include "host/drive/PromiseFile.h"
 #include "host/drive/SmallFile.h"
-#include "host/system/PosixFileSystem.h"
-#include "host/system/Translate.h"
+#include "host/system/files/PosixFileSystem.h"
+#include "host/system/texts/Translate.h"
 
 #include <fcntl.h>
 #include <sys/xattr.h>

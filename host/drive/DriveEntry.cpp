@@ -3,7 +3,7 @@
 #include "host/drive/BeneathRoot.h"
 #include "host/drive/PromiseRecord.h"
 #include "host/drive/SmallFile.h"
-#include "host/system/SystemErrors.h"
+#include "host/system/files/SystemErrors.h"
 
 #include <fcntl.h>
 #include <signal.h>

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "host/drive/DriveLayout.h"
-#include "host/system/FileDescriptor.h"
-#include "host/system/FileVersion.h"
+#include "host/system/files/FileDescriptor.h"
+#include "host/system/files/FileVersion.h"
 #include "platform/FileSystem.h"
 
 #include <sys/stat.h>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/system/FolderWatcher.h"
+#include "host/system/listing/FolderWatcher.h"
 #include "platform/Dispatch.h"
 
 #include <functional>

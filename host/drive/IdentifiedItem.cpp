@@ -5,7 +5,7 @@
 #include "host/drive/ItemFacts.h"
 #include "host/drive/PromiseRecord.h"
 #include "host/drive/SmallFile.h"
-#include "host/system/AtomicWrite.h"
+#include "host/system/files/AtomicWrite.h"
 
 #include <fcntl.h>
 #include <sys/xattr.h>

@@ -2,7 +2,7 @@
 
 #include "host/drive/DocumentIndex.h"
 #include "host/drive/DriveLayout.h"
-#include "host/system/FileDescriptor.h"
+#include "host/system/files/FileDescriptor.h"
 #include "platform/DocumentIdentifiers.h"
 
 #include <sys/stat.h>

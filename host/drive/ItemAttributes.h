@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/drive/ItemFacts.h"
-#include "host/system/DriveNames.h"
+#include "host/system/files/DriveNames.h"
 #include "platform/DocumentContainers.h"
 #include "platform/Localization.h"
 #include "platform/TypeRegistry.h"

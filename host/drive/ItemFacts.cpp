@@ -2,8 +2,8 @@
 
 #include "host/drive/BeneathRoot.h"
 #include "host/drive/SmallFile.h"
-#include "host/system/CoordinatedRead.h"
-#include "host/system/PosixFileSystem.h"
+#include "host/system/coordination/CoordinatedRead.h"
+#include "host/system/files/PosixFileSystem.h"
 #include "platform/Log.h"
 
 #include <fcntl.h>

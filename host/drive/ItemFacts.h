@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/drive/PromiseRecord.h"
-#include "host/system/FileDescriptor.h"
+#include "host/system/files/FileDescriptor.h"
 #include "platform/Attributes.h"
 #include "platform/Error.h"
 

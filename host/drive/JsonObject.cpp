@@ -1,6 +1,6 @@
 #include "host/drive/JsonObject.h"
 
-#include "host/system/JsonFile.h"
+#include "host/system/files/JsonFile.h"
 
 namespace host::drive {
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/drive/DriveLayout.h"
-#include "host/system/DriveNames.h"
+#include "host/system/files/DriveNames.h"
 #include "platform/Error.h"
 #include "platform/Url.h"
 

@@ -2,7 +2,7 @@
 
 #include "host/drive/SmallFile.h"
 #include "host/drive/TreeCopy.h"
-#include "host/system/DirectoryReader.h"
+#include "host/system/files/DirectoryReader.h"
 
 #include <fcntl.h>
 

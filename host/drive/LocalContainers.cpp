@@ -1,7 +1,7 @@
 #include "host/drive/LocalContainers.h"
 
 #include "host/drive/SmallFile.h"
-#include "host/system/DirectoryReader.h"
+#include "host/system/files/DirectoryReader.h"
 #include "platform/Log.h"
 
 #include <fcntl.h>

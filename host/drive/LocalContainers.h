@@ -2,7 +2,7 @@
 
 #include "host/drive/ContainerRecord.h"
 #include "host/drive/DriveLayout.h"
-#include "host/system/ItemChanges.h"
+#include "host/system/files/ItemChanges.h"
 #include "platform/DocumentContainers.h"
 
 #include <map>

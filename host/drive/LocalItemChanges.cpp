@@ -7,8 +7,8 @@
 #include "host/drive/PromiseFile.h"
 #include "host/drive/SmallFile.h"
 #include "host/drive/TreeCopy.h"
-#include "host/system/SystemErrors.h"
-#include "host/system/Translate.h"
+#include "host/system/files/SystemErrors.h"
+#include "host/system/texts/Translate.h"
 
 #include <fcntl.h>
 

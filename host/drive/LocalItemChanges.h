@@ -2,7 +2,7 @@
 
 #include "host/drive/DriveEntry.h"
 #include "host/drive/TreeWalk.h"
-#include "host/system/ItemChanges.h"
+#include "host/system/files/ItemChanges.h"
 
 #include <memory>
 

@@ -1,7 +1,7 @@
 #include "host/drive/PromiseFile.h"
 
 #include "host/drive/SmallFile.h"
-#include "host/system/AtomicWrite.h"
+#include "host/system/files/AtomicWrite.h"
 
 #include <fcntl.h>
 

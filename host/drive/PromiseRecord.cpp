@@ -1,7 +1,7 @@
 #include "host/drive/PromiseRecord.h"
 
 #include "host/drive/JsonScanner.h"
-#include "host/system/ItemPaths.h"
+#include "host/system/files/ItemPaths.h"
 
 #include <nlohmann/json.hpp>
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/system/DriveNames.h"
+#include "host/system/files/DriveNames.h"
 #include "platform/Attributes.h"
 #include "platform/Error.h"
 

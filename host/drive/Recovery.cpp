@@ -7,7 +7,7 @@
 #include "host/drive/SmallFile.h"
 #include "host/drive/TreeCopy.h"
 #include "host/drive/TreeWalk.h"
-#include "host/system/DirectoryReader.h"
+#include "host/system/files/DirectoryReader.h"
 #include "platform/Log.h"
 
 #include <fcntl.h>

@@ -1,7 +1,7 @@
 #include "host/drive/SmallFile.h"
 
-#include "host/system/SystemErrors.h"
-#include "host/system/Translate.h"
+#include "host/system/files/SystemErrors.h"
+#include "host/system/texts/Translate.h"
 #include "platform/Localization.h"
 
 #include <fcntl.h>

@@ -2,7 +2,7 @@
 
 #include "host/drive/BeneathRoot.h"
 #include "host/drive/DriveEntry.h"
-#include "host/system/DirectoryReader.h"
+#include "host/system/files/DirectoryReader.h"
 
 #include <fcntl.h>
 

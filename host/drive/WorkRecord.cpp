@@ -2,7 +2,7 @@
 
 #include "host/drive/DriveEntry.h"
 #include "host/drive/SmallFile.h"
-#include "host/system/DirectoryReader.h"
+#include "host/system/files/DirectoryReader.h"
 
 #include <fcntl.h>
 

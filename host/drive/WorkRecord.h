@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/drive/DriveLayout.h"
-#include "host/system/FileDescriptor.h"
+#include "host/system/files/FileDescriptor.h"
 
 #include <functional>
 #include <optional>

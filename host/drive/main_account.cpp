@@ -1,7 +1,7 @@
 #include "host/drive/AccountRecord.h"
 #include "host/drive/SmallFile.h"
 #include "host/drive/sample/SampleDrive.h"
-#include "host/system/AtomicWrite.h"
+#include "host/system/files/AtomicWrite.h"
 
 #include <sys/stat.h>
 

@@ -3,7 +3,7 @@
 #include "host/gtk/ObjectRef.h"
 #include "host/gtk/PrintRun.h"
 #include "host/gtk/PrintablePages.h"
-#include "host/system/Translate.h"
+#include "host/system/texts/Translate.h"
 #include "platform/Dispatch.h"
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"

@@ -1,6 +1,6 @@
 #include "host/gtk/PreviewModule.h"
 
-#include "host/system/Translate.h"
+#include "host/system/texts/Translate.h"
 #include "platform/Dispatch.h"
 #include "platform/Log.h"
 #include "platform/Services.h"

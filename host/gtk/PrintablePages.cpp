@@ -2,7 +2,7 @@
 
 #include "host/gtk/ObjectRef.h"
 #include "host/gtk/PreviewModule.h"
-#include "host/system/Translate.h"
+#include "host/system/texts/Translate.h"
 #include "screens/preview/TextDecoding.h"
 
 #include <gdk-pixbuf/gdk-pixbuf.h>

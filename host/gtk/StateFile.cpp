@@ -1,7 +1,7 @@
 #include "host/gtk/StateFile.h"
 
-#include "host/system/AtomicWrite.h"
-#include "host/system/JsonKeyedArchiver.h"
+#include "host/system/files/AtomicWrite.h"
+#include "host/system/files/JsonKeyedArchiver.h"
 #include "platform/Log.h"
 
 #include <algorithm>

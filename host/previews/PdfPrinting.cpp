@@ -1,7 +1,7 @@
 #include "host/previews/PdfPrinting.h"
 
 #include "host/gtk/ObjectRef.h"
-#include "host/system/Translate.h"
+#include "host/system/texts/Translate.h"
 
 #include <poppler.h>
 

@@ -2,7 +2,7 @@
 
 #include "host/previews/PopplerEditing.h"
 #include "host/previews/PopplerPages.h"
-#include "host/system/SystemErrors.h"
+#include "host/system/files/SystemErrors.h"
 
 #include <sys/stat.h>
 #include <unistd.h>

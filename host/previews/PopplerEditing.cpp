@@ -1,7 +1,7 @@
 #include "host/previews/PopplerEditing.h"
 
 #include "host/previews/PopplerFields.h"
-#include "host/system/FileDescriptor.h"
+#include "host/system/files/FileDescriptor.h"
 
 #include <sys/mman.h>
 #include <sys/stat.h>

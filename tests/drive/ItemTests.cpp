@@ -1,5 +1,5 @@
 #include "host/drive/ItemFacts.h"
-#include "host/system/PosixFileSystem.h"
+#include "host/system/files/PosixFileSystem.h"
 #include "platform/TypeRegistry.h"
 #include "tests/support/DriveFixture.h"
 

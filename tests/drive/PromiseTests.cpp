@@ -1,5 +1,5 @@
 #include "host/drive/PromiseRecord.h"
-#include "host/system/CoordinatedRead.h"
+#include "host/system/coordination/CoordinatedRead.h"
 #include "platform/FileCoordinator.h"
 #include "tests/support/DriveFixture.h"
 

@@ -1,6 +1,6 @@
 #include "WindowFixture.h"
 #include "host/gtk/PrintablePages.h"
-#include "host/system/GLibDispatch.h"
+#include "host/system/queues/GLibDispatch.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Services.h"
 #include "screens/preview/PreviewMediaView.h"

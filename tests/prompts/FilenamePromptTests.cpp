@@ -1,4 +1,4 @@
-#include "host/system/UnicodeCharacterData.h"
+#include "host/system/texts/UnicodeCharacterData.h"
 #include "kit/AlertController.h"
 #include "kit/Label.h"
 #include "kit/TextField.h"

@@ -2,8 +2,8 @@
 
 #include "host/drive/ItemFacts.h"
 #include "host/drive/SmallFile.h"
-#include "host/system/FileDescriptor.h"
-#include "host/system/PosixFileSystem.h"
+#include "host/system/files/FileDescriptor.h"
+#include "host/system/files/PosixFileSystem.h"
 
 #include <fcntl.h>
 #include <glib.h>

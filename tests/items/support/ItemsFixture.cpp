@@ -1,13 +1,13 @@
 #include "tests/items/support/ItemsFixture.h"
 
-#include "host/system/IcuFormatters.h"
-#include "host/system/JsonKeyedArchiver.h"
-#include "host/system/JsonUserDefaults.h"
-#include "host/system/MimeTypeRegistry.h"
-#include "host/system/PosixFileSystem.h"
-#include "host/system/ThreadedFolderLister.h"
-#include "host/system/TypePreviewSupport.h"
-#include "host/system/UnicodeCharacterData.h"
+#include "host/system/desktop/MimeTypeRegistry.h"
+#include "host/system/desktop/TypePreviewSupport.h"
+#include "host/system/files/JsonKeyedArchiver.h"
+#include "host/system/files/JsonUserDefaults.h"
+#include "host/system/files/PosixFileSystem.h"
+#include "host/system/listing/ThreadedFolderLister.h"
+#include "host/system/texts/IcuFormatters.h"
+#include "host/system/texts/UnicodeCharacterData.h"
 #include "platform/Services.h"
 
 #include <filesystem>

@@ -1,7 +1,7 @@
 #include "tests/screens/support/ComponentsFixture.h"
 
-#include "host/system/MimeTypeRegistry.h"
-#include "host/system/ThreadedFolderLister.h"
+#include "host/system/desktop/MimeTypeRegistry.h"
+#include "host/system/listing/ThreadedFolderLister.h"
 #include "kit/ListView.h"
 
 #include <chrono>

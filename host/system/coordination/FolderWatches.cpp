@@ -1,0 +1,35 @@
+#include "host/system/coordination/FolderWatches.h"
+
+#include <sys/inotify.h>
+
+namespace host::system {
+
+int FolderWatches::hold(const std::string& folder)
+{
+    const int watch = _inotify->watch(folder);
+    if (watch >= 0)
+        ++_holders[watch];
+    return watch;
+}
+
+void FolderWatches::release(int watch)
+{
+    const auto found = _holders.find(watch);
+    if (found == _holders.end() || --found->second > 0)
+        return;
+    _holders.erase(found);
+    _inotify->unwatch(watch);
+}
+
+std::vector<Inotify::Event> FolderWatches::take()
+{
+    auto events = _inotify->take();
+    // The kernel has ended such a watch itself, and never uses its number again.
+    for (const auto& event : events) {
+        if (event.mask & IN_IGNORED)
+            _holders.erase(event.watch);
+    }
+    return events;
+}
+
+} // namespace host::system

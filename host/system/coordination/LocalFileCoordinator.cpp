@@ -1,0 +1,212 @@
+#include "host/system/coordination/LocalFileCoordinator.h"
+
+#include "host/system/coordination/CoordinatedRead.h"
+#include "host/system/files/ItemPaths.h"
+#include "host/system/files/SystemErrors.h"
+#include "platform/Log.h"
+
+#include <algorithm>
+#include <array>
+#include <cerrno>
+#include <system_error>
+
+namespace host::system {
+
+using platform::Error;
+using platform::ReadingOptions;
+using platform::Url;
+using platform::WritingOptions;
+using Claims = std::vector<LockFile::Claim>;
+
+namespace {
+
+/// What the current thread has, over all coordinators: the locks of two open files exclude each other even in
+/// one thread, so what is had already is not asked for again.
+thread_local Claims claimsOfThread;
+
+/// Keeps claims entered as the thread's.
+class EnteredClaims {
+public:
+    explicit EnteredClaims(const Claims& claims)
+        : _before(claimsOfThread.size())
+    {
+        claimsOfThread.insert(claimsOfThread.end(), claims.begin(), claims.end());
+    }
+    EnteredClaims(const EnteredClaims&) = delete;
+    EnteredClaims& operator=(const EnteredClaims&) = delete;
+    ~EnteredClaims() { claimsOfThread.resize(_before); }
+
+private:
+    std::size_t _before;
+};
+
+bool isCovered(const LockFile::Claim& claim)
+{
+    return std::ranges::any_of(claimsOfThread, [&](const auto& had) {
+        return had.mode == LockMode::Exclusive ? isPathWithin(claim.path, had.path)
+                                               : claim.mode == LockMode::Shared && claim.path == had.path;
+    });
+}
+
+/// Whether the thread would wait for itself: its own lock is in the way.
+bool isBlocked(const LockFile::Claim& claim)
+{
+    return claim.mode == LockMode::Exclusive && std::ranges::any_of(claimsOfThread, [&](const auto& had) {
+        return isPathWithin(had.path, claim.path);
+    });
+}
+
+/// The moves that were announced in the current write of this thread and did not happen yet.
+thread_local std::vector<std::string> announcedMoves;
+
+} // namespace
+
+LocalFileCoordinator::LocalFileCoordinator()
+    : LocalFileCoordinator(Settings())
+{
+}
+
+LocalFileCoordinator::LocalFileCoordinator(Settings settings)
+    : _locks(std::move(settings.lockFile))
+    , _lockPatience(settings.lockPatience)
+    , _notices(std::make_shared<PresenterNotices>(settings.patience, std::move(settings.beforeWaiting)))
+{
+    if (settings.dispatch && !settings.root.empty())
+        _watch = PresenterWatch::create(_notices, std::move(settings.dispatch), std::move(settings.root));
+}
+
+LocalFileCoordinator::~LocalFileCoordinator()
+{
+    if (_watch)
+        _watch->stop();
+}
+
+std::optional<Error> LocalFileCoordinator::coordinateReading(
+    const Url& url, ReadingOptions options, const Accessor& accessor)
+{
+    if (options == ReadingOptions::ImmediatelyAvailableMetadataOnly) {
+        const CoordinatedRead marked;
+        accessor(url);
+        return std::nullopt;
+    }
+    bool isRead = false;
+    auto error = runLocked({{url.path(), LockMode::Shared}}, [&] {
+        isRead = true;
+        accessor(url);
+    });
+    // Where not even the lock file can be written nobody writes, and there is nothing to wait for.
+    if (error && !isRead && (error->code() == EROFS || error->code() == EACCES)) {
+        accessor(url);
+        return std::nullopt;
+    }
+    return error;
+}
+
+std::optional<Error> LocalFileCoordinator::runLocked(const Claims& claims, const std::function<void()>& body)
+{
+    static constexpr platform::Operation op{"-[LocalFileCoordinator runLocked:]"};
+    Claims missing;
+    std::ranges::copy_if(claims, std::back_inserter(missing), [](const auto& c) { return !isCovered(c); });
+    for (const auto& claim : missing) {
+        if (isBlocked(claim))
+            return systemError(EDEADLK, claim.path);
+    }
+    FileDescriptor held;
+    if (const int failure = missing.empty() ? 0 : _locks.acquire(missing, _lockPatience, held);
+        failure != 0) {
+        op.warning(
+            "Cannot lock %@: %{public}s", missing.front().path, std::generic_category().message(failure));
+        return systemError(failure, missing.front().path);
+    }
+    const EnteredClaims entered(missing);
+    body();
+    return std::nullopt;
+}
+
+std::optional<Error> LocalFileCoordinator::write(
+    std::span<const Target> targets, const std::function<void()>& body)
+{
+    Claims claims;
+    for (const auto& target : targets) {
+        claims.push_back({target.url.path(), LockMode::Exclusive});
+        if (target.options != WritingOptions::ForDeleting)
+            continue;
+        if (auto refused = _notices->askForDeletion(target.url)) {
+            tellAfterwards(target);
+            return refused;
+        }
+    }
+    auto error = runLocked(claims, [&] { runWatched(targets, body); });
+    std::ranges::for_each(targets, [this](const auto& target) { tellAfterwards(target); });
+    return error;
+}
+
+/// Runs a write that this process's presenters hear of otherwise than by the watch.
+void LocalFileCoordinator::runWatched(std::span<const Target> targets, const std::function<void()>& body)
+{
+    if (!_watch)
+        return body();
+    std::vector<PresenterWatch::OwnWrite> writes;
+    for (const auto& target : targets)
+        writes.push_back({target.url.path(), target.options == WritingOptions::ForDeleting});
+    _watch->beginOwnWrite(writes);
+    body();
+    _watch->endOwnWrite(writes);
+}
+
+void LocalFileCoordinator::tellAfterwards(const Target& target)
+{
+    const auto& url = target.url;
+    const bool wasOnlyAnnounced = std::erase(announcedMoves, url.path()) > 0;
+    const bool isMoveDone = target.options == WritingOptions::ForMoving && !wasOnlyAnnounced;
+    const bool isGone = target.options == WritingOptions::ForDeleting && !isItemThere(url.path());
+    // Whoever presents the item itself has heard of the move or of the deletion; its folder changed.
+    if (isMoveDone || isGone)
+        _notices->tellOfChange(url.deletingLastPathComponent());
+    else
+        _notices->tellOfChange(url);
+}
+
+std::optional<Error> LocalFileCoordinator::coordinateWriting(
+    const Url& url, WritingOptions options, const Accessor& accessor)
+{
+    const std::array targets{Target{url, options}};
+    return write(targets, [&] { accessor(url); });
+}
+
+std::optional<Error> LocalFileCoordinator::coordinateWriting(const Url& first, WritingOptions firstOptions,
+    const Url& second, WritingOptions secondOptions, const PairAccessor& accessor)
+{
+    const std::array targets{Target{first, firstOptions}, Target{second, secondOptions}};
+    return write(targets, [&] { accessor(first, second); });
+}
+
+void LocalFileCoordinator::itemWillMove(const Url& from, const Url& to)
+{
+    announcedMoves.push_back(from.path());
+    _notices->announceMove(from, to);
+}
+
+void LocalFileCoordinator::itemDidMove(const Url& from, const Url& to)
+{
+    std::erase(announcedMoves, from.path());
+    _notices->tellOfMove(from, to);
+    if (_watch)
+        _watch->ownMove(from.path(), to.path());
+}
+
+void LocalFileCoordinator::addFilePresenter(const std::shared_ptr<platform::FilePresenter>& presenter)
+{
+    _notices->add(presenter);
+    if (_watch)
+        _watch->presentersChanged();
+}
+
+void LocalFileCoordinator::removeFilePresenter(const platform::FilePresenter& presenter)
+{
+    _notices->remove(presenter);
+    if (_watch)
+        _watch->presentersChanged();
+}
+
+} // namespace host::system

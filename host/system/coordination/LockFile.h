@@ -1,0 +1,46 @@
+#pragma once
+
+#include "host/system/files/FileDescriptor.h"
+#include "platform/Dispatch.h"
+
+#include <cstdint>
+#include <map>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace host::system {
+
+enum class LockMode : std::uint8_t { Shared, Exclusive };
+
+/// Readers and writers of paths, between threads and between processes that use the same lock file.
+///
+/// Every path has one byte of the file, which holds nothing. Whoever has a path shares the bytes of the
+/// folders above it, so a writer of a folder has everything below it. The locks belong to an open file of
+/// their own: they go when it is closed, also by the kernel after a process was killed. Each set is taken in
+/// the order of the bytes, which is the same for everyone: no two sets wait for each other.
+class LockFile {
+public:
+    struct Claim {
+        std::string path; ///< absolute, without "." and ".."
+        LockMode mode;
+    };
+
+    /// `path` empty: a file without a name, for this process alone. The file and its folder are made when
+    /// they are missing.
+    explicit LockFile(std::string path);
+
+    /// Waits until all claims can be had, but no longer than `patience` in all. Answers 0, and the open file
+    /// that holds the locks until it is closed, else the errno of what failed: EBUSY when someone else kept
+    /// them all that time, EROFS or EACCES when the file cannot be written.
+    int acquire(const std::vector<Claim>& claims, platform::Duration patience, FileDescriptor& held) const;
+
+private:
+    using Bytes = std::map<std::int64_t, LockMode>;
+    static void addPath(Bytes& bytes, const Claim& claim);
+
+    std::string _path;
+    FileDescriptor _unnamed;
+};
+
+} // namespace host::system

@@ -1,0 +1,68 @@
+#include "host/system/coordination/PresentedItem.h"
+
+#include "host/system/files/FileVersion.h"
+#include "host/system/files/ItemPaths.h"
+
+#include <fcntl.h>
+
+#include <array>
+#include <cerrno>
+#include <climits>
+
+namespace host::system {
+
+namespace {
+
+FileDescriptor openAsMark(const std::string& path)
+{
+    return FileDescriptor(::open(path.c_str(), O_PATH | O_NOFOLLOW | O_CLOEXEC));
+}
+
+} // namespace
+
+PresentedItem::Finding PresentedItem::look()
+{
+    auto found = openAsMark(_path);
+    if (!found && errno == ENOENT)
+        found = openAsMark(promisePath(_path));
+    struct stat status;
+    if (!found) {
+        if (!_file || (errno != ENOENT && errno != ENOTDIR))
+            return Finding::Same;
+        return whereabouts() ? Finding::Moved : Finding::Gone;
+    }
+    if (::fstat(found.get(), &status) != 0)
+        return Finding::Same;
+    const auto version = versionOf(status);
+    const bool isSame = _file && version == _version;
+    _file = std::move(found);
+    _version = version;
+    _isFolder = S_ISDIR(status.st_mode);
+    return isSame ? Finding::Same : Finding::Changed;
+}
+
+std::optional<std::string> PresentedItem::whereabouts() const
+{
+    std::array<char, PATH_MAX> buffer;
+    const auto link = "/proc/self/fd/" + std::to_string(_file.get());
+    const auto length = ::readlink(link.c_str(), buffer.data(), buffer.size());
+    if (length <= 0)
+        return std::nullopt;
+    const std::string path(buffer.data(), static_cast<std::size_t>(length));
+    const auto nameAt = path.rfind('/') + 1;
+    const auto name = itemName(path.substr(nameAt));
+    // What was removed is named too, with a remark at the end that could be part of a name.
+    struct stat status;
+    if (isPassingName(name) || ::lstat(path.c_str(), &status) != 0 || status.st_dev != _version.device
+        || status.st_ino != _version.inode)
+        return std::nullopt;
+    return path.substr(0, nameAt) + name;
+}
+
+void PresentedItem::forget()
+{
+    _file.reset();
+    _isFolder = false;
+}
+
+} // namespace host::system

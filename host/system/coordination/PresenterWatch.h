@@ -1,0 +1,79 @@
+#pragma once
+
+#include "host/system/coordination/WatchedPresenter.h"
+#include "platform/Dispatch.h"
+
+#include <atomic>
+#include <memory>
+#include <mutex>
+#include <span>
+#include <string>
+#include <vector>
+
+namespace host::system {
+
+/// Tells presenters what other processes do to their items, coordinated or not, after it was done. Looks
+/// begin a moment after the first event, so that one save is told once; writes of this process are left out.
+/// Any thread.
+class PresenterWatch : public std::enable_shared_from_this<PresenterWatch> {
+public:
+    struct OwnWrite {
+        std::string path;
+        bool isDeletion;
+    };
+
+    /// `root` is the drive's documents area.
+    static std::shared_ptr<PresenterWatch> create(std::shared_ptr<PresenterNotices> notices,
+        std::shared_ptr<platform::Dispatch> dispatch, std::string root);
+
+    /// A presenter came, left, or presents another item: it is asked soon.
+    void presentersChanged();
+    /// After this nobody is told anything more.
+    void stop();
+
+    /// Around each write of this process, inside its locks. Its presenters hear of it otherwise.
+    void beginOwnWrite(std::span<const OwnWrite> writes);
+    void endOwnWrite(std::span<const OwnWrite> writes);
+    /// Inside such a write: the item was moved.
+    void ownMove(const std::string& from, const std::string& to);
+
+private:
+    PresenterWatch(std::shared_ptr<PresenterNotices> notices, std::shared_ptr<platform::Dispatch> dispatch,
+        std::string root);
+
+    struct Asked {
+        std::weak_ptr<platform::FilePresenter> presenter;
+        std::string path;
+    };
+    std::vector<Asked> askPresenters() const;
+    std::unique_ptr<FolderWatches> makeWatches();
+    platform::Work later(void (PresenterWatch::*step)());
+
+    // Steps on the queue.
+    void askAgain();
+    void readEvents();
+    void look();
+    void poll();
+
+    // With the mutex held.
+    void update(const std::vector<Asked>& asked);
+    void markEvents();
+    void lookLater(platform::Duration delay);
+    bool isOwn(const std::string& path) const;
+    bool mustLook(const WatchedPresenter& presenter) const;
+    void absorb(WatchedPresenter& presenter, std::span<const OwnWrite> writes);
+
+    const std::shared_ptr<PresenterNotices> _notices;
+    const std::shared_ptr<platform::Dispatch> _dispatch;
+    const std::shared_ptr<platform::Queue> _queue;
+    const std::string _root;
+    std::atomic_bool _isReading = false, _isStopped = false;
+
+    std::mutex _mutex; ///< for everything below; held while the disk is looked at
+    std::unique_ptr<FolderWatches> _watches;
+    std::vector<WatchedPresenter> _presenters;
+    std::vector<std::string> _ownPaths; ///< being written now
+    bool _isLookComing = false, _isPollComing = false;
+};
+
+} // namespace host::system

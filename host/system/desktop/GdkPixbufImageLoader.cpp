@@ -1,0 +1,320 @@
+#include "host/system/desktop/GdkPixbufImageLoader.h"
+
+#include "host/system/desktop/GifFrames.h"
+#include "host/system/desktop/JpegEnd.h"
+#include "host/system/files/FileDescriptor.h"
+#include "host/system/files/SystemErrors.h"
+
+#include <fcntl.h>
+#include <gdk-pixbuf/gdk-pixbuf.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <array>
+#include <cerrno>
+#include <cmath>
+#include <memory>
+#include <optional>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+namespace host::system {
+
+using platform::Error;
+using platform::Image;
+using platform::ImageErrorCode;
+using platform::ImageLimits;
+using platform::Picture;
+using platform::Result;
+
+namespace {
+
+struct Unref {
+    void operator()(gpointer object) const { g_object_unref(object); }
+};
+using Pixbuf = std::unique_ptr<GdkPixbuf, Unref>;
+using Animation = std::unique_ptr<GdkPixbufAnimation, Unref>;
+using Cancelled = std::function<bool()>;
+
+Error imageError(ImageErrorCode code)
+{
+    return {platform::errorDomain::image, static_cast<int>(code)};
+}
+
+std::optional<Error> checkFile(const std::string& path, const ImageLimits& limits)
+{
+    struct stat status { };
+    if (::stat(path.c_str(), &status) != 0)
+        return errno == ENOENT ? Error(platform::FileErrorCode::NoSuchFile) : systemError(errno, path);
+    // Anything but a regular file could keep the reader waiting.
+    if (!S_ISREG(status.st_mode))
+        return imageError(ImageErrorCode::Damaged);
+    if (static_cast<std::uint64_t>(status.st_size) > limits.maxFileBytes)
+        return imageError(ImageErrorCode::TooLarge);
+    return std::nullopt;
+}
+
+struct PixelSize {
+    int width, height;
+    bool operator==(const PixelSize&) const = default;
+};
+
+/// The largest size of this shape that the limits allow.
+PixelSize fitted(PixelSize size, const ImageLimits& limits)
+{
+    const double width = size.width, height = size.height;
+    double shrink = std::min({1.0, limits.maxWidth / width, limits.maxHeight / height});
+    if (limits.maxPixels > 0)
+        shrink = std::min(shrink, std::sqrt(static_cast<double>(limits.maxPixels) / (width * height)));
+    const auto shrunk = [shrink](
+                            int side) { return std::max(1, static_cast<int>(std::lround(side * shrink))); };
+    return {shrunk(size.width), shrunk(size.height)};
+}
+
+/// What to decode to, as long as nobody knows whether the picture lies on its side.
+PixelSize fittedEitherWay(PixelSize size, const ImageLimits& limits)
+{
+    const auto lying = fitted({size.height, size.width}, limits);
+    const auto standing = fitted(size, limits);
+    return lying.height > standing.width ? PixelSize{lying.height, lying.width} : standing;
+}
+
+/// The picture's own size, by its header.
+Result<PixelSize> sizeInFile(const std::string& path, const ImageLimits& limits)
+{
+    int width = 0, height = 0;
+    if (!gdk_pixbuf_get_file_info(path.c_str(), &width, &height) || width <= 0 || height <= 0)
+        return imageError(ImageErrorCode::Damaged);
+    if (static_cast<std::uint64_t>(width) * static_cast<std::uint64_t>(height) > limits.maxSourcePixels)
+        return imageError(ImageErrorCode::TooLarge);
+    return PixelSize{width, height};
+}
+
+/// Turns the picture as its camera noted, and makes it as small as the limits want.
+Pixbuf upright(const GdkPixbuf* decoded, const ImageLimits& limits)
+{
+    Pixbuf turned(gdk_pixbuf_apply_embedded_orientation(const_cast<GdkPixbuf*>(decoded)));
+    if (!turned)
+        return nullptr;
+    const PixelSize size{gdk_pixbuf_get_width(turned.get()), gdk_pixbuf_get_height(turned.get())};
+    const auto wanted = fitted(size, limits);
+    if (wanted != size)
+        turned.reset(gdk_pixbuf_scale_simple(turned.get(), wanted.width, wanted.height, GDK_INTERP_BILINEAR));
+    return turned;
+}
+
+std::uint32_t premultiplied(const guchar* pixel, bool hasAlpha)
+{
+    const std::uint32_t alpha = hasAlpha ? pixel[3] : 255;
+    const auto component = [&](int index) { return (pixel[index] * alpha + 127) / 255; };
+    return alpha << 24 | component(0) << 16 | component(1) << 8 | component(2);
+}
+
+Image imageOf(const GdkPixbuf* pixbuf, double scale)
+{
+    const int width = gdk_pixbuf_get_width(pixbuf), height = gdk_pixbuf_get_height(pixbuf);
+    const auto rowBytes = static_cast<std::size_t>(gdk_pixbuf_get_rowstride(pixbuf));
+    const auto channels = static_cast<std::size_t>(gdk_pixbuf_get_n_channels(pixbuf));
+    const bool hasAlpha = gdk_pixbuf_get_has_alpha(pixbuf);
+    const guchar* bytes = gdk_pixbuf_read_pixels(pixbuf);
+    std::vector<std::uint32_t> pixels;
+    pixels.reserve(static_cast<std::size_t>(width) * static_cast<std::size_t>(height));
+    for (int y = 0; y < height; ++y) {
+        const guchar* row = bytes + static_cast<std::size_t>(y) * rowBytes;
+        for (int x = 0; x < width; ++x)
+            pixels.push_back(premultiplied(row + static_cast<std::size_t>(x) * channels, hasAlpha));
+    }
+    return Image::fromPixels(width, height, scale, std::move(pixels));
+}
+
+/// A file that is read piece by piece, so that the reading can be given up.
+class PictureFile {
+public:
+    explicit PictureFile(const std::string& path)
+        : _file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK))
+    {
+    }
+    bool isOpen() const { return static_cast<bool>(_file); }
+
+    /// Nothing after the end or a fault.
+    std::string_view next()
+    {
+        ssize_t count = 0;
+        do
+            count = ::read(_file.get(), _buffer.data(), _buffer.size());
+        while (count < 0 && errno == EINTR);
+        return {_buffer.data(), count > 0 ? static_cast<std::size_t>(count) : 0};
+    }
+
+private:
+    FileDescriptor _file;
+    std::array<char, 64 << 10> _buffer{};
+};
+
+/// The library's decoder. Being cancelled, it ends without looking at what it has.
+class Decoder {
+public:
+    explicit Decoder(PixelSize size)
+        : _loader(gdk_pixbuf_loader_new())
+        , _size(size)
+    {
+        g_signal_connect(_loader.get(), "size-prepared",
+            G_CALLBACK(+[](GdkPixbufLoader* loader, int, int, const PixelSize* wanted) {
+                gdk_pixbuf_loader_set_size(loader, wanted->width, wanted->height);
+            }),
+            &_size);
+    }
+    ~Decoder() { end(); }
+    Decoder(const Decoder&) = delete;
+    Decoder& operator=(const Decoder&) = delete;
+
+    bool feed(std::string_view bytes)
+    {
+        const auto* data = reinterpret_cast<const guchar*>(bytes.data());
+        return gdk_pixbuf_loader_write(_loader.get(), data, bytes.size(), nullptr) != FALSE;
+    }
+    /// False: the picture is not whole.
+    bool end()
+    {
+        return std::exchange(_ended, true) || gdk_pixbuf_loader_close(_loader.get(), nullptr) != FALSE;
+    }
+    Animation animation() const
+    {
+        auto* found = gdk_pixbuf_loader_get_animation(_loader.get());
+        if (found)
+            g_object_ref(found);
+        return Animation(found);
+    }
+
+private:
+    std::unique_ptr<GdkPixbufLoader, Unref> _loader;
+    PixelSize _size;
+    bool _ended = false;
+};
+
+struct Decoded {
+    Animation animation;
+    std::size_t frames = 1;
+    bool breaksOff = false;
+};
+
+Result<Decoded> decode(const std::string& path, PixelSize size, const Cancelled& isCancelled)
+{
+    PictureFile file(path);
+    if (!file.isOpen())
+        return systemError(errno, path);
+    Decoder decoder(size);
+    std::string gif; // the bytes, while they may be an animation's
+    JpegEnd jpegEnd;
+    bool breaksOff = false, isFirst = true;
+    for (auto piece = file.next(); !piece.empty(); piece = file.next()) {
+        if (isCancelled())
+            return imageError(ImageErrorCode::Cancelled);
+        if (!gif.empty() || (isFirst && piece.starts_with("GIF8")))
+            gif += piece;
+        jpegEnd.feed(piece);
+        isFirst = false;
+        breaksOff = !decoder.feed(piece);
+        if (breaksOff)
+            break;
+    }
+    breaksOff = !decoder.end() || breaksOff || jpegEnd.isMissing();
+    auto animation = decoder.animation();
+    if (!animation)
+        return imageError(ImageErrorCode::Damaged);
+    return Decoded{std::move(animation), std::max<std::size_t>(1, gifFrameCount(gif)), breaksOff};
+}
+
+// The library's animations know no other clock than this type that its own library discourages.
+G_GNUC_BEGIN_IGNORE_DEPRECATIONS
+using AnimationTime = GTimeVal;
+G_GNUC_END_IGNORE_DEPRECATIONS
+
+void advance(AnimationTime& time, int milliseconds)
+{
+    constexpr glong perSecond = 1'000'000;
+    time.tv_usec += glong{milliseconds} * 1000;
+    time.tv_sec += time.tv_usec / perSecond;
+    time.tv_usec %= perSecond;
+}
+
+std::vector<Picture::Frame> framesOf(
+    const Decoded& decoded, const ImageLimits& limits, const Cancelled& isCancelled)
+{
+    std::vector<Picture::Frame> frames;
+    AnimationTime now{};
+    const std::unique_ptr<GdkPixbufAnimationIter, Unref> step(
+        gdk_pixbuf_animation_get_iter(decoded.animation.get(), &now));
+    while (frames.size() < decoded.frames && !isCancelled()) {
+        const auto shown = upright(gdk_pixbuf_animation_iter_get_pixbuf(step.get()), limits);
+        const int delay = gdk_pixbuf_animation_iter_get_delay_time(step.get());
+        if (!shown)
+            break;
+        frames.push_back({imageOf(shown.get(), limits.scale), std::max(delay, 0)});
+        if (delay < 0)
+            break;
+        advance(now, std::max(delay, 1));
+        gdk_pixbuf_animation_iter_advance(step.get(), &now);
+    }
+    return frames;
+}
+
+bool isMoving(const Decoded& decoded, PixelSize size, const ImageLimits& limits)
+{
+    const auto bytes =
+        static_cast<std::uint64_t>(size.width) * static_cast<std::uint64_t>(size.height) * 4 * decoded.frames;
+    return decoded.frames > 1 && bytes <= limits.maxAnimationBytes
+        && !gdk_pixbuf_animation_is_static_image(decoded.animation.get());
+}
+
+Picture stillOf(const Decoded& decoded, const ImageLimits& limits)
+{
+    Picture picture;
+    const auto* pixbuf = gdk_pixbuf_animation_get_static_image(decoded.animation.get());
+    const auto shown = pixbuf ? upright(pixbuf, limits) : nullptr;
+    if (shown)
+        picture.frames.push_back({imageOf(shown.get(), limits.scale), 0});
+    return picture;
+}
+
+} // namespace
+
+Result<Image> GdkPixbufImageLoader::load(const std::string& path, const ImageLimits& limits) const
+{
+    auto still = limits;
+    still.maxAnimationBytes = 0;
+    const auto picture = loadPicture(path, still, [] { return false; });
+    return picture ? Result<Image>(picture->frames.front().image) : Result<Image>(*picture.error);
+}
+
+Result<Picture> GdkPixbufImageLoader::loadPicture(
+    const std::string& path, const ImageLimits& limits, const Cancelled& isCancelled) const
+{
+    if (const auto refused = checkFile(path, limits))
+        return *refused;
+    const auto size = sizeInFile(path, limits);
+    if (!size)
+        return *size.error;
+    const auto wanted = fittedEitherWay(*size, limits);
+    const auto decoded = decode(path, wanted, isCancelled);
+    if (!decoded)
+        return *decoded.error;
+    auto picture = stillOf(*decoded.value, limits);
+    picture.breaksOff = decoded->breaksOff;
+    if (isMoving(*decoded.value, wanted, limits))
+        picture.frames = framesOf(*decoded.value, limits, isCancelled);
+    if (isCancelled())
+        return imageError(ImageErrorCode::Cancelled);
+    if (picture.frames.empty())
+        return imageError(ImageErrorCode::Damaged);
+    const auto& shown = picture.frames.front().image;
+    const bool wasTurned = (shown.pixelWidth() < shown.pixelHeight()) != (size->width < size->height)
+        && size->width != size->height;
+    picture.sourceWidth = wasTurned ? size->height : size->width;
+    picture.sourceHeight = wasTurned ? size->width : size->height;
+    return picture;
+}
+
+} // namespace host::system

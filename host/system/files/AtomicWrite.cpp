@@ -1,0 +1,142 @@
+#include "host/system/files/AtomicWrite.h"
+
+#include "host/system/files/SystemErrors.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <atomic>
+#include <cerrno>
+#include <cstdio>
+
+namespace host::system {
+
+using platform::Error;
+
+namespace {
+
+FileDescriptor openParent(const std::string& path)
+{
+    const auto slash = path.rfind('/');
+    const auto parent = slash == std::string::npos ? "." : slash == 0 ? "/" : path.substr(0, slash);
+    return FileDescriptor(::open(parent.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
+}
+
+std::string lastName(const std::string& path)
+{
+    return path.substr(path.rfind('/') + 1);
+}
+
+std::string temporaryName()
+{
+    static std::atomic<unsigned> counter = 0;
+    timespec now{};
+    clock_gettime(CLOCK_REALTIME, &now);
+    char name[80];
+    std::snprintf(name, sizeof name, ".trwtmp-%x-%lx%lx-%x", static_cast<unsigned>(getpid()),
+        static_cast<unsigned long>(now.tv_sec), static_cast<unsigned long>(now.tv_nsec), counter++);
+    return name;
+}
+
+bool writeWhole(const FileDescriptor& file, std::string_view content)
+{
+    while (!content.empty()) {
+        const auto written = ::write(file.get(), content.data(), content.size());
+        if (written < 0 && errno != EINTR)
+            return false;
+        if (written > 0)
+            content.remove_prefix(static_cast<std::size_t>(written));
+    }
+    return true;
+}
+
+/// The access that the file under the name gives now.
+mode_t modeToKeep(const FileDescriptor& folder, const std::string& name)
+{
+    struct stat found;
+    const bool isThere = ::fstatat(folder.get(), name.c_str(), &found, AT_SYMLINK_NOFOLLOW) == 0;
+    return isThere && S_ISREG(found.st_mode) ? found.st_mode & 0777 : S_IRUSR | S_IWUSR;
+}
+
+/// The errno of what failed; 0 when the whole content lies on the disk under the temporary name.
+int writeTemporary(
+    const FileDescriptor& folder, const std::string& name, mode_t mode, std::string_view content)
+{
+    constexpr int flags = O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC | O_NOFOLLOW;
+    const FileDescriptor file(::openat(folder.get(), name.c_str(), flags, S_IRUSR | S_IWUSR));
+    if (!file)
+        return errno;
+    const bool isWritten =
+        writeWhole(file, content) && ::fchmod(file.get(), mode) == 0 && ::fsync(file.get()) == 0;
+    return isWritten ? 0 : errno;
+}
+
+/// fsync refuses descriptors that only name a folder, so it is opened anew.
+int syncFolder(const FileDescriptor& folder)
+{
+    const FileDescriptor readable(::openat(folder.get(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    return readable && ::fsync(readable.get()) == 0 ? 0 : errno;
+}
+
+} // namespace
+
+std::optional<Error> writeFileAtomically(const std::string& path, std::string_view content)
+{
+    const auto folder = openParent(path);
+    if (!folder)
+        return systemError(errno, path);
+    return writeFileAtomically(folder, lastName(path), content, path);
+}
+
+std::optional<Error> writeFileAtomically(
+    const FileDescriptor& folder, const std::string& name, std::string_view content, std::string_view path)
+{
+    const auto temporary = temporaryName();
+    int failure = writeTemporary(folder, temporary, modeToKeep(folder, name), content);
+    if (!failure && ::renameat(folder.get(), temporary.c_str(), folder.get(), name.c_str()) != 0)
+        failure = errno;
+    if (failure) {
+        ::unlinkat(folder.get(), temporary.c_str(), 0);
+        return systemError(failure, path);
+    }
+    failure = syncFolder(folder);
+    return failure ? std::optional(systemError(failure, path)) : std::nullopt;
+}
+
+platform::Result<std::string> readWholeFile(const std::string& path, std::size_t maximumBytes)
+{
+    const auto folder = openParent(path);
+    if (!folder)
+        return systemError(errno, path);
+    return readWholeFile(folder, lastName(path), maximumBytes, path);
+}
+
+platform::Result<std::string> readWholeFile(
+    const FileDescriptor& folder, const std::string& name, std::size_t maximumBytes, std::string_view path)
+{
+    // Without O_NONBLOCK a named pipe under the name would hold the caller until someone writes to it.
+    constexpr int flags = O_RDONLY | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY;
+    const FileDescriptor file(::openat(folder.get(), name.c_str(), flags));
+    struct stat found;
+    if (!file || ::fstat(file.get(), &found) != 0)
+        return systemError(errno, path);
+    if (!S_ISREG(found.st_mode))
+        return systemError(S_ISDIR(found.st_mode) ? EISDIR : ENXIO, path);
+    std::string content;
+    char piece[16 * 1024];
+    for (;;) {
+        const auto length = ::read(file.get(), piece, sizeof piece);
+        if (length == 0)
+            return content;
+        if (length < 0 && errno == EINTR)
+            continue;
+        if (length < 0)
+            return systemError(errno, path);
+        content.append(piece, static_cast<std::size_t>(length));
+        if (content.size() > maximumBytes)
+            return systemError(EFBIG, path);
+    }
+}
+
+} // namespace host::system

@@ -1,0 +1,48 @@
+#include "host/system/files/ItemPaths.h"
+
+#include "host/system/files/DriveNames.h"
+
+#include <sys/stat.h>
+
+namespace host::system {
+
+bool isPathWithin(std::string_view path, std::string_view folder)
+{
+    return path.starts_with(folder)
+        && (path.size() == folder.size() || folder == "/" || path[folder.size()] == '/');
+}
+
+std::string parentPath(const std::string& path)
+{
+    const auto slash = path.rfind('/');
+    return slash == 0 ? "/" : path.substr(0, slash);
+}
+
+std::string promisePath(std::string_view path)
+{
+    const auto nameAt = path.rfind('/') + 1;
+    std::string promise;
+    promise.reserve(path.size() + 1 + promiseSuffix.size());
+    promise.append(path.substr(0, nameAt)).append(".").append(path.substr(nameAt)).append(promiseSuffix);
+    return promise;
+}
+
+std::string itemName(std::string_view name)
+{
+    const bool isPromise =
+        name.starts_with('.') && name.ends_with(promiseSuffix) && name.size() > promiseSuffix.size() + 1;
+    return std::string(isPromise ? name.substr(1, name.size() - promiseSuffix.size() - 1) : name);
+}
+
+bool isPassingName(std::string_view name)
+{
+    return name.starts_with(passingPrefix);
+}
+
+bool isItemThere(const std::string& path)
+{
+    struct stat found;
+    return ::lstat(path.c_str(), &found) == 0 || ::lstat(promisePath(path).c_str(), &found) == 0;
+}
+
+} // namespace host::system

@@ -1,0 +1,36 @@
+#pragma once
+
+#include "host/system/files/JsonFile.h"
+#include "platform/UserDefaults.h"
+
+#include <memory>
+#include <string>
+
+namespace platform {
+class Dispatch;
+class Queue;
+} // namespace platform
+
+namespace host::system {
+
+/// User defaults in one JSON file. It is read once; changes are written atomically on a queue, several at
+/// once as one write, and those that still wait when the object ends are written then. A file that is there
+/// but cannot be read, or that a newer version wrote, is left as it is.
+class JsonUserDefaults : public platform::UserDefaults {
+public:
+    JsonUserDefaults(std::string path, platform::Dispatch& dispatch);
+    ~JsonUserDefaults() override;
+
+    std::optional<platform::Data> data(const std::string& key) const override;
+    void setData(const std::string& key, platform::Data value) override;
+    void remove(const std::string& key) override;
+
+private:
+    class Store;
+    void writeSoon();
+
+    std::shared_ptr<Store> _store;
+    std::shared_ptr<platform::Queue> _queue;
+};
+
+} // namespace host::system

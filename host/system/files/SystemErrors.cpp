@@ -1,0 +1,107 @@
+#include "host/system/files/SystemErrors.h"
+
+#include "host/system/texts/Translate.h"
+#include "platform/Localization.h"
+
+#include <glib.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <iterator>
+#include <memory>
+
+namespace host::system {
+
+using platform::Error;
+using platform::FileErrorCode;
+
+namespace {
+
+/// What to say of an error, "%@" standing for the item's name.
+struct Sentence {
+    int errorNumber;
+    const char* key;
+};
+
+constexpr Sentence sentences[] = {
+    {ENOENT, textKey("“%@” is no longer there.")},
+    {EEXIST, textKey("An item named “%@” already exists here.")},
+    {ENOTEMPTY, textKey("“%@” isn’t empty.")},
+    {ENAMETOOLONG, textKey("The name “%@” is too long.")},
+    {EILSEQ, textKey("The name “%@” can’t be used.")},
+    {EINVAL, textKey("The name “%@” can’t be used.")},
+    {EACCES, textKey("You don’t have permission to use “%@”.")},
+    {EPERM, textKey("You don’t have permission to use “%@”.")},
+    {EROFS, textKey("“%@” is in a place that can only be read.")},
+    {ENOSPC, textKey("There isn’t enough space for “%@”.")},
+    {EDQUOT, textKey("There isn’t enough space for “%@”.")},
+    {EFBIG, textKey("“%@” is too large for this storage.")},
+    {ENOTDIR, textKey("“%@” isn’t a folder.")},
+    {EISDIR, textKey("“%@” is a folder.")},
+    {ELOOP, textKey("“%@” is a link that can’t be followed.")},
+    {EXDEV, textKey("“%@” lies outside the drive or on another storage.")},
+    {EBUSY, textKey("“%@” is being used by another program.")},
+    {ETXTBSY, textKey("“%@” is being used by another program.")},
+    {EAGAIN, textKey("“%@” is being used by another program.")},
+    {EMFILE, textKey("“%@” can’t be opened because too many files are open.")},
+    {ENFILE, textKey("“%@” can’t be opened because too many files are open.")},
+    {EIO, textKey("The storage that holds “%@” failed.")},
+    {ENXIO, textKey("The storage that holds “%@” failed.")},
+    {ENODEV, textKey("The storage that holds “%@” failed.")},
+    {ETIMEDOUT, textKey("The storage that holds “%@” doesn’t answer.")},
+    {ESTALE, textKey("The storage that holds “%@” doesn’t answer.")},
+    {EHOSTDOWN, textKey("The storage that holds “%@” doesn’t answer.")},
+    {EHOSTUNREACH, textKey("The storage that holds “%@” doesn’t answer.")},
+    {EOPNOTSUPP, textKey("The storage that holds “%@” can’t do this.")},
+};
+
+std::string sentence(int errorNumber)
+{
+    const auto* found = std::ranges::find(sentences, errorNumber, &Sentence::errorNumber);
+    return translated(found != std::end(sentences) ? found->key : textKey("“%@” can’t be used."));
+}
+
+std::optional<FileErrorCode> fileErrorCode(int errorNumber)
+{
+    switch (errorNumber) {
+    case ENOENT:
+        return FileErrorCode::NoSuchItem;
+    case EEXIST:
+        return FileErrorCode::ItemExists;
+    case ENAMETOOLONG:
+    case EILSEQ:
+        return FileErrorCode::InvalidName;
+    default:
+        return std::nullopt;
+    }
+}
+
+} // namespace
+
+std::string displayName(std::string_view path)
+{
+    if (const auto slash = path.rfind('/'); slash != std::string_view::npos && path.size() > 1)
+        path.remove_prefix(slash + 1);
+    const std::unique_ptr<char, decltype(&g_free)> valid(
+        g_utf8_make_valid(path.empty() ? "" : path.data(), static_cast<gssize>(path.size())), g_free);
+    return valid.get();
+}
+
+Error systemError(int errorNumber, std::string_view path, const std::optional<std::string>& destination)
+{
+    // A name is taken or refused where the item was to go, not where it comes from.
+    const bool concernsDestination = errorNumber == EEXIST || errorNumber == ENOTEMPTY
+        || errorNumber == ENAMETOOLONG || errorNumber == EILSEQ || errorNumber == EINVAL;
+    const auto name = displayName(destination && concernsDestination ? *destination : path);
+    platform::PropertyDictionary info;
+    info.emplace(platform::errorKey::filePath, std::string(path));
+    info.emplace(
+        platform::errorKey::localizedDescription, platform::formatText(sentence(errorNumber), {name}));
+    if (destination)
+        info.emplace(platform::errorKey::destinationFilePath, *destination);
+    if (const auto code = fileErrorCode(errorNumber))
+        return Error(*code, std::move(info));
+    return Error(platform::errorDomain::system, errorNumber, std::move(info));
+}
+
+} // namespace host::system

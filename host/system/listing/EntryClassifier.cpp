@@ -1,0 +1,58 @@
+#include "host/system/listing/EntryClassifier.h"
+
+#include "host/system/files/DriveNames.h"
+
+namespace host::system {
+
+using platform::FileType;
+using platform::FolderEntry;
+using platform::FolderEntryKind;
+
+namespace {
+
+/// What follows the last dot, by the same rules as Url::pathExtension().
+std::string_view extensionOf(std::string_view name)
+{
+    const auto dot = name.rfind('.');
+    const bool hasNone = dot == std::string_view::npos || dot == 0;
+    return hasNone || name.find(' ', dot) != std::string_view::npos ? std::string_view()
+                                                                    : name.substr(dot + 1);
+}
+
+FolderEntryKind kindOfFile(std::string_view name)
+{
+    const auto extension = extensionOf(name);
+    return extension == referenceExtension || extension == aliasExtension ? FolderEntryKind::Link
+                                                                          : FolderEntryKind::Document;
+}
+
+} // namespace
+
+FolderEntryKind EntryClassifier::kindOfFolder(std::string_view name) const
+{
+    return _types->isPackageExtension(extensionOf(name)) ? FolderEntryKind::Package : FolderEntryKind::Folder;
+}
+
+std::optional<FolderEntry> EntryClassifier::classify(std::string_view name, FileType type) const
+{
+    if (name.starts_with('.')) {
+        if (type != FileType::Regular || !name.ends_with(promiseSuffix)
+            || name.size() <= promiseSuffix.size() + 1)
+            return std::nullopt;
+        const auto promised = name.substr(1, name.size() - 1 - promiseSuffix.size());
+        if (promised.starts_with('.'))
+            return std::nullopt; // the promise of a hidden item
+        const bool isPackage = kindOfFolder(promised) == FolderEntryKind::Package;
+        return FolderEntry{promised, isPackage ? FolderEntryKind::Package : kindOfFile(promised), true};
+    }
+    switch (type) {
+    case FileType::Directory:
+        return FolderEntry{name, kindOfFolder(name), false};
+    case FileType::SymbolicLink:
+        return FolderEntry{name, FolderEntryKind::Link, false};
+    default:
+        return FolderEntry{name, kindOfFile(name), false};
+    }
+}
+
+} // namespace host::system

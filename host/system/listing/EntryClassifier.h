@@ -1,0 +1,31 @@
+#pragma once
+
+#include "host/system/desktop/MimeTypeRegistry.h"
+#include "platform/FileSystem.h"
+#include "platform/FolderSnapshot.h"
+
+#include <memory>
+#include <optional>
+#include <string_view>
+
+namespace host::system {
+
+/// Tells from a name and the file system's type alone what a folder's list shows for it. Any thread.
+class EntryClassifier {
+public:
+    explicit EntryClassifier(std::shared_ptr<const MimeTypeRegistry> types)
+        : _types(std::move(types))
+    {
+    }
+
+    /// What the list shows, the entry's name being the logical one and a part of `name`; nothing for what is
+    /// hidden. A promise shows as a document, or as a package when its name says so.
+    std::optional<platform::FolderEntry> classify(std::string_view name, platform::FileType type) const;
+
+private:
+    platform::FolderEntryKind kindOfFolder(std::string_view name) const;
+
+    std::shared_ptr<const MimeTypeRegistry> _types;
+};
+
+} // namespace host::system

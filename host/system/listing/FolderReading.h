@@ -1,0 +1,77 @@
+#pragma once
+
+#include "host/system/files/DirectoryReader.h"
+#include "host/system/listing/EntryClassifier.h"
+#include "host/system/listing/ListingBlock.h"
+#include "host/system/listing/NameOrder.h"
+#include "platform/Dispatch.h"
+#include "platform/FolderLister.h"
+
+#include <atomic>
+#include <functional>
+#include <memory>
+#include <mutex>
+#include <optional>
+#include <string_view>
+#include <unordered_set>
+#include <vector>
+
+namespace host::system {
+
+/// What all readings share.
+struct ListingTools {
+    EntryClassifier classifier;
+    NameOrder order;
+    std::shared_ptr<platform::OperationQueue> queue;
+};
+
+/// One reading of a folder. Blocks of entries are read one after the other, each on whatever thread of the
+/// queue is free; the thread that read a block sorts it while the next one is being read; the last to end
+/// merges them. It keeps itself alive until then.
+class FolderReading : public std::enable_shared_from_this<FolderReading> {
+public:
+    using ExtraItems = std::vector<platform::FolderSnapshot::ExtraItem>;
+    /// What is listed, and how.
+    struct Subject {
+        platform::Url folder;
+        ExtraItems extraItems;
+        platform::FolderGrouping grouping;
+    };
+    struct Handlers {
+        /// Called once with the open folder, before the first entry is read.
+        std::function<void(const FileDescriptor&)> opened;
+        /// Called with the first rows when there are many, and then with all of them.
+        std::function<void(std::shared_ptr<const platform::FolderSnapshot>)> snapshot;
+    };
+
+    /// The handlers are called on threads of the queue.
+    FolderReading(std::shared_ptr<const ListingTools> tools, Subject subject, Handlers handlers);
+
+    void start();
+    /// No handler begins after the work that runs now.
+    void cancel() { _isCancelled = true; }
+
+private:
+    void open();
+    void readBlock();
+    std::shared_ptr<ListingBlock> fillBlock();
+    void finishBlock(ListingBlock& block);
+    void appendExtraItems(ListingBlock& block);
+    void merge();
+    void appendRow(platform::FolderSnapshot::Builder& builder, const ListingBlock& block, std::size_t number);
+    std::unordered_set<std::string_view> promisesOfPresentItems() const;
+    void fail(int errorNumber);
+
+    const std::shared_ptr<const ListingTools> _tools;
+    const Subject _subject;
+    const Handlers _handlers;
+    std::atomic<bool> _isCancelled = false;
+
+    FileDescriptor _descriptor;
+    std::optional<DirectoryReader> _reader;
+    std::optional<platform::Error> _error;
+    std::vector<std::shared_ptr<ListingBlock>> _blocks; // filled one at a time
+    std::atomic<std::size_t> _unfinished = 0; // blocks that are read or sorted, and the reading itself
+};
+
+} // namespace host::system

@@ -1,0 +1,224 @@
+#include "host/system/listing/FolderRevising.h"
+
+#include "host/system/files/DriveNames.h"
+
+#include <algorithm>
+#include <array>
+#include <numeric>
+#include <unordered_map>
+#include <utility>
+
+namespace host::system {
+
+using platform::FileType;
+using platform::FolderEntry;
+using platform::FolderEntryKind;
+using platform::FolderGrouping;
+using platform::FolderRevision;
+using platform::FolderSnapshot;
+
+namespace {
+
+/// What stands at a name now.
+struct Look {
+    bool isThere = false, isPromise = false, isPlaced = false; ///< placed: the list before has its place
+    FolderEntryKind kind = FolderEntryKind::Document;
+};
+
+bool isFolder(FolderEntryKind kind)
+{
+    return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
+}
+
+class Revising {
+public:
+    Revising(const ListingTools& tools, FolderGrouping grouping, const FolderSnapshot& before)
+        : _tools(tools)
+        , _grouping(grouping)
+        , _before(before)
+    {
+    }
+
+    void lookAt(const FileDescriptor& folder, std::span<const std::string> names);
+    void findInListBefore();
+    void sortNewcomers();
+    std::shared_ptr<const FolderSnapshot> make(const std::shared_ptr<const FolderSnapshot>& before);
+    bool isNothingNew() const { return _gone.empty() && _stayed.empty() && _newcomers.count() == 0; }
+
+private:
+    struct NameHash : std::hash<std::string_view> {
+        using is_transparent = void;
+    };
+    using Stayed = std::pair<std::uint32_t, Look>;
+
+    Look look(const FileDescriptor& folder, const std::string& name) const;
+    void place(std::uint32_t index, const FolderEntry& entry, Look& look);
+    bool isBefore(std::size_t index, std::size_t newcomer) const;
+    std::size_t placeOf(std::size_t newcomer, std::size_t from) const;
+    void takeOver(FolderSnapshot::Builder& builder, std::size_t from, std::size_t to);
+
+    const ListingTools& _tools;
+    const FolderGrouping _grouping;
+    const FolderSnapshot& _before;
+    std::unordered_map<std::string, Look, NameHash, std::equal_to<>> _looks;
+    std::vector<std::uint32_t> _gone; ///< indexes in the list before
+    std::vector<Stayed> _stayed; ///< likewise, and what they are now
+    ListingBlock _newcomers;
+    std::vector<std::size_t> _places; ///< of the newcomers, before which index of the list before
+    mutable std::vector<std::uint8_t> _key; ///< of the entry that is compared
+    FolderRevision _revision;
+    std::size_t _nextGone = 0, _nextStayed = 0;
+};
+
+/// Adds what a name that was told of stands for to what is looked at.
+void Revising::lookAt(const FileDescriptor& folder, std::span<const std::string> names)
+{
+    for (const auto& name : names) {
+        // A hidden name counts for what it promises.
+        const auto listed = _tools.classifier.classify(name, FileType::Regular);
+        if (!listed)
+            continue;
+        const auto [found, isNew] = _looks.try_emplace(std::string(listed->name));
+        if (isNew)
+            found->second = look(folder, found->first);
+    }
+}
+
+Look Revising::look(const FileDescriptor& folder, const std::string& name) const
+{
+    Look found;
+    const auto type = typeOfEntry(folder, name);
+    const auto promise = '.' + name + std::string(promiseSuffix);
+    std::optional<FolderEntry> entry;
+    if (type)
+        entry = _tools.classifier.classify(name, *type);
+    else if (const auto promiseType = typeOfEntry(folder, promise))
+        entry = _tools.classifier.classify(promise, *promiseType);
+    if (entry)
+        found = {true, entry->isPromise, false, entry->kind};
+    return found;
+}
+
+void Revising::findInListBefore()
+{
+    // Most names of a long list have another length than the few that are sought.
+    std::array<bool, 256> lengths{};
+    const auto lengthMark = [](std::string_view name) { return std::min<std::size_t>(name.size(), 255); };
+    for (const auto& [name, look] : _looks)
+        lengths[lengthMark(name)] = true;
+    for (std::size_t index = 0; index < _before.count(); ++index) {
+        const auto entry = _before.entry(index);
+        if (!lengths[lengthMark(entry.name)] || _before.extraItem(index))
+            continue;
+        if (const auto found = _looks.find(entry.name); found != _looks.end())
+            place(static_cast<std::uint32_t>(index), entry, found->second);
+    }
+}
+
+void Revising::place(std::uint32_t index, const FolderEntry& entry, Look& look)
+{
+    const bool keepsGroup = _grouping == FolderGrouping::Mixed || isFolder(entry.kind) == isFolder(look.kind);
+    look.isPlaced = look.isThere && keepsGroup;
+    if (look.isPlaced)
+        _stayed.emplace_back(index, look);
+    else
+        _gone.push_back(index);
+}
+
+void Revising::sortNewcomers()
+{
+    for (const auto& [name, look] : _looks) {
+        if (look.isThere && !look.isPlaced)
+            _newcomers.append({name, look.kind, look.isPromise});
+    }
+    _newcomers.sort(_tools.order, _grouping);
+    for (std::size_t i = 0; i < _newcomers.count(); ++i)
+        _places.push_back(placeOf(i, _places.empty() ? 0 : _places.back()));
+}
+
+bool Revising::isBefore(std::size_t index, std::size_t newcomer) const
+{
+    const auto entry = _before.entry(index);
+    _key.clear();
+    ListingBlock::appendKey(entry, _tools.order, _grouping, _key);
+    return _newcomers.isAfter(entry, _key, newcomer);
+}
+
+/// Newcomers are often neighbours, so that the place is sought in growing steps first.
+std::size_t Revising::placeOf(std::size_t newcomer, std::size_t from) const
+{
+    std::size_t step = 1, end = from;
+    for (; end < _before.count() && isBefore(end, newcomer); step *= 2) {
+        from = end + 1;
+        end += step;
+    }
+    end = std::min(end, _before.count());
+    while (from < end) {
+        const auto half = from + (end - from) / 2;
+        if (isBefore(half, newcomer))
+            from = half + 1;
+        else
+            end = half;
+    }
+    return from;
+}
+
+/// Takes over a stretch of the list before, without what has gone.
+void Revising::takeOver(FolderSnapshot::Builder& builder, std::size_t from, std::size_t to)
+{
+    while (from < to) {
+        const std::size_t gone = _nextGone < _gone.size() ? _gone[_nextGone] : to;
+        const std::size_t stayed = _nextStayed < _stayed.size() ? _stayed[_nextStayed].first : to;
+        const auto end = std::min({gone, stayed, to});
+        builder.keep(_before, from, end - from);
+        from = end;
+        if (from == to)
+            return;
+        if (from == stayed) {
+            const auto& look = _stayed[_nextStayed++].second;
+            _revision.touched.push_back(static_cast<std::uint32_t>(builder.count()));
+            builder.keep(_before, from, look.kind, look.isPromise);
+        } else {
+            ++_nextGone;
+        }
+        ++from;
+    }
+}
+
+std::shared_ptr<const FolderSnapshot> Revising::make(const std::shared_ptr<const FolderSnapshot>& before)
+{
+    FolderSnapshot::Builder builder(_before);
+    builder.reserve(_before.count() + _newcomers.count(), 0);
+    std::size_t taken = 0;
+    for (std::size_t i = 0; i < _newcomers.count(); ++i) {
+        takeOver(builder, taken, _places[i]);
+        taken = _places[i];
+        _revision.inserted.push_back(static_cast<std::uint32_t>(builder.count()));
+        const auto entry = _newcomers.entry(_newcomers.numberAt(i));
+        builder.append(entry.name, entry.kind, entry.isPromise);
+    }
+    takeOver(builder, taken, _before.count());
+    _revision.before = before;
+    _revision.removed = std::move(_gone);
+    return builder.finish(std::move(_revision));
+}
+
+} // namespace
+
+bool mayBeListed(std::string_view name)
+{
+    return !name.starts_with('.') || name.ends_with(promiseSuffix);
+}
+
+std::shared_ptr<const FolderSnapshot> revisedList(const ListingTools& tools, FolderGrouping grouping,
+    const FileDescriptor& folder, const std::shared_ptr<const FolderSnapshot>& before,
+    std::span<const std::string> names)
+{
+    Revising revising(tools, grouping, *before);
+    revising.lookAt(folder, names);
+    revising.findInListBefore();
+    revising.sortNewcomers();
+    return revising.isNothingNew() ? before : revising.make(before);
+}
+
+} // namespace host::system

@@ -1,0 +1,65 @@
+#pragma once
+
+#include "host/system/listing/FolderReading.h"
+#include "host/system/listing/FolderWatcher.h"
+#include "platform/FolderLister.h"
+
+#include <memory>
+#include <mutex>
+#include <optional>
+#include <string>
+#include <unordered_set>
+#include <vector>
+
+namespace host::system {
+
+/// Keeps one folder's list up to date: reads it whole once, and then looks again at the names that the kernel
+/// tells of. What is lost, or too much at once, is read whole again. One work at a time; the pauses between
+/// them grow with what they take. Main thread, but for what the works report.
+class WatchedListing : public platform::FolderListing, public std::enable_shared_from_this<WatchedListing> {
+public:
+    WatchedListing(std::shared_ptr<platform::Dispatch> dispatch, std::shared_ptr<const ListingTools> tools,
+        FolderReading::Subject subject, platform::FolderLister::Update update);
+    ~WatchedListing() override;
+
+    void refresh() override;
+
+private:
+    class Inbox;
+    /// Which folder was read, lest a list be continued with what another one at its place holds.
+    struct Identity {
+        std::uint64_t device = 0, inode = 0;
+        bool operator==(const Identity&) const = default;
+    };
+    using Snapshot = std::shared_ptr<const platform::FolderSnapshot>;
+    using Names = std::vector<std::string>;
+
+    void watch();
+    void folderChanged(const Names& names);
+    void filesWritten(const Names& names);
+    void restFor(platform::Duration pause);
+    void work();
+    void startReading();
+    void deliver();
+    void startRevising();
+    void revisingEnded(const Snapshot& before, const Snapshot& after);
+    void workEnded();
+    bool isTooMuch() const;
+    static std::optional<Identity> identityOf(const FileDescriptor& folder);
+
+    const std::shared_ptr<platform::Dispatch> _dispatch;
+    const std::shared_ptr<const ListingTools> _tools;
+    const FolderReading::Subject _subject;
+    const platform::FolderLister::Update _update;
+    std::shared_ptr<FolderWatcher> _watcher;
+    std::shared_ptr<Inbox> _inbox;
+    std::shared_ptr<FolderReading> _reading; ///< null while none is under way
+    Snapshot _latest; ///< what revisions go on from; null: only a reading can help
+    std::unordered_set<std::string> _names; ///< that were told of and not looked at since
+    std::unordered_set<std::string> _written; ///< that are being written, and looked at now and then
+    platform::Date _workBegan;
+    std::uint64_t _rest = 0; ///< numbers the rests, of which only the last counts
+    bool _isRevising = false, _mustRead = false, _mustSettle = false, _isResting = false;
+};
+
+} // namespace host::system

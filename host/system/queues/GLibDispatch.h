@@ -1,0 +1,44 @@
+#pragma once
+
+#include "host/system/queues/MainQueue.h"
+#include "platform/Dispatch.h"
+
+#include <array>
+#include <functional>
+#include <memory>
+
+namespace host::system {
+
+class Scheduler;
+class WorkerPool;
+
+/// Queues on GLib's default main context and on bounded pools of threads, one pool for each quality of
+/// service and one for the serial queues. Make it on the main thread, and let it end there, after everything
+/// that uses it: what has not begun by then never runs, what has is waited for.
+class GLibDispatch : public platform::Dispatch {
+public:
+    GLibDispatch();
+    ~GLibDispatch() override;
+
+    std::shared_ptr<platform::Queue> mainQueue() override { return _mainQueue; }
+    bool isMainThread() const override { return _mainQueue->isCurrentThread(); }
+    std::shared_ptr<platform::Queue> makeSerialQueue(std::string label) override;
+    std::shared_ptr<platform::OperationQueue> makeOperationQueue(
+        std::string name, platform::QualityOfService quality) override;
+    void after(platform::Duration delay, const std::shared_ptr<platform::Queue>& queue,
+        platform::Work work) override;
+    std::unique_ptr<platform::Timer> startTimer(const std::shared_ptr<platform::Queue>& queue,
+        platform::Duration period, platform::Duration leeway, platform::Work handler) override;
+    platform::Date now() const override;
+    /// For programs without a window: runs what the main queue has until there is no more to wait for, which
+    /// is asked after each piece of work. Called on the main thread.
+    void runMainQueueUntil(const std::function<bool()>& isOver);
+
+private:
+    std::shared_ptr<MainQueue> _mainQueue;
+    std::shared_ptr<WorkerPool> _serialPool;
+    std::array<std::shared_ptr<WorkerPool>, 4> _operationPools; // by QualityOfService
+    std::shared_ptr<Scheduler> _scheduler;
+};
+
+} // namespace host::system

@@ -1,0 +1,233 @@
+#include "host/system/search/IndexedNameSearch.h"
+
+#include "host/system/search/NameGathering.h"
+
+#include <atomic>
+#include <chrono>
+#include <mutex>
+#include <utility>
+
+namespace host::system {
+
+using platform::NameSearchResults;
+using platform::Url;
+
+namespace {
+
+using Index = std::shared_ptr<const NameIndex>;
+
+constexpr auto refreshInterval = std::chrono::seconds(2);
+constexpr auto keptUnused = std::chrono::seconds(60);
+
+std::vector<std::string> pathsOf(const std::vector<Url>& folders)
+{
+    std::vector<std::string> paths;
+    for (const auto& folder : folders)
+        paths.push_back(folder.path());
+    return paths;
+}
+
+} // namespace
+
+/// What all searches share: the index of the last one, and the queues.
+class IndexedNameSearch::Store : public std::enable_shared_from_this<Store> {
+public:
+    Store(std::shared_ptr<platform::Dispatch> usedDispatch, std::shared_ptr<const MimeTypeRegistry> types)
+        : dispatch(std::move(usedDispatch))
+        , classifier(std::move(types))
+        , reading(dispatch->makeSerialQueue("name search reading"))
+        , finding(dispatch->makeSerialQueue("name search"))
+    {
+    }
+
+    /// The index of just these roots, when it is kept.
+    Index indexOf(const std::vector<std::string>& roots)
+    {
+        const std::lock_guard lock(_mutex);
+        return roots == _roots ? _index : nullptr;
+    }
+    void keep(const std::vector<std::string>& roots, Index index)
+    {
+        const std::lock_guard lock(_mutex);
+        _roots = roots;
+        _index = std::move(index);
+    }
+    void sessionBegan() { ++_sessions; }
+    void sessionEnded()
+    {
+        --_sessions;
+        dispatch->after(keptUnused, reading, [weak = weak_from_this(), number = ++_ended] {
+            if (const auto store = weak.lock(); store && store->_sessions == 0 && store->_ended == number)
+                store->keep({}, nullptr);
+        });
+    }
+
+    const std::shared_ptr<platform::Dispatch> dispatch;
+    const EntryClassifier classifier;
+    const NameFolding folding;
+    const std::shared_ptr<platform::Queue> reading, finding;
+
+private:
+    std::mutex _mutex;
+    std::vector<std::string> _roots;
+    Index _index;
+    std::atomic<int> _sessions = 0;
+    std::atomic<unsigned> _ended = 0;
+};
+
+class IndexedNameSearch::Session : public platform::NameSearchSession,
+                                   public std::enable_shared_from_this<Session> {
+public:
+    Session(std::shared_ptr<Store> store, std::vector<std::string> roots, Update update)
+        : _store(std::move(store))
+        , _roots(std::move(roots))
+        , _update(std::move(update))
+        , _index(_store->indexOf(_roots))
+    {
+        _store->sessionBegan();
+    }
+    ~Session() override { _store->sessionEnded(); }
+
+    void setQuery(std::string query) override
+    {
+        {
+            const std::lock_guard lock(_mutex);
+            _query = std::move(query);
+            ++_generation;
+        }
+        findSoon();
+    }
+
+    void refreshSoon()
+    {
+        _store->reading->async([weak = weak_from_this()] {
+            const auto session = weak.lock();
+            const auto store = session ? session->_store : nullptr;
+            const auto earlier = session ? session->index() : nullptr;
+            const auto roots = session ? session->_roots : std::vector<std::string>();
+            if (store)
+                refresh(weak, *store, roots, earlier);
+        });
+    }
+
+private:
+    using Weak = std::weak_ptr<Session>;
+
+    Index index()
+    {
+        const std::lock_guard lock(_mutex);
+        return _index;
+    }
+
+    /// Reads the names without keeping the session alive, so that its end ends the reading.
+    static void refresh(
+        const Weak& weak, Store& store, const std::vector<std::string>& roots, const Index& earlier)
+    {
+        NameGathering gathering(store.classifier, store.folding, earlier,
+            {.isCancelled = [&weak] { return weak.expired(); },
+                .progress =
+                    [&weak](const NameIndex& soFar) {
+                        if (const auto session = weak.lock())
+                            session->adopt(std::make_shared<const NameIndex>(soFar), false);
+                    }});
+        auto gathered = gathering.gather(roots);
+        const auto session = weak.lock();
+        if (!session)
+            return;
+        if (gathering.hasChanged() || !earlier)
+            session->adopt(std::make_shared<const NameIndex>(std::move(gathered)), true);
+        else
+            session->completed();
+        store.dispatch->after(refreshInterval, store.reading, [weak] {
+            if (const auto again = weak.lock())
+                again->refreshSoon();
+        });
+    }
+
+    void adopt(Index index, bool isComplete)
+    {
+        if (isComplete)
+            _store->keep(_roots, index);
+        {
+            const std::lock_guard lock(_mutex);
+            _index = std::move(index);
+            _isComplete = isComplete;
+        }
+        findSoon();
+    }
+
+    void completed()
+    {
+        {
+            const std::lock_guard lock(_mutex);
+            if (std::exchange(_isComplete, true))
+                return;
+        }
+        findSoon();
+    }
+
+    void findSoon()
+    {
+        if (_findIsWaiting.exchange(true))
+            return;
+        _store->finding->async([weak = weak_from_this()] {
+            if (const auto session = weak.lock())
+                session->find();
+        });
+    }
+
+    void find()
+    {
+        _findIsWaiting = false;
+        NameSearchResults results;
+        Index index;
+        unsigned generation = 0;
+        {
+            const std::lock_guard lock(_mutex);
+            index = _index;
+            results.query = _query;
+            results.isComplete = _isComplete;
+            generation = _generation;
+        }
+        if (!index)
+            return;
+        std::string folded;
+        _store->folding.append(results.query, folded);
+        const auto found = index->find(folded, shownItems, [&] { return _generation != generation; });
+        results.total = found.total;
+        for (const auto number : found.items)
+            results.items.push_back(index->found(number));
+        _store->dispatch->mainQueue()->async(
+            [weak = weak_from_this(), generation, results = std::move(results)] {
+                if (const auto session = weak.lock(); session && session->_generation == generation)
+                    session->_update(results);
+            });
+    }
+
+    const std::shared_ptr<Store> _store;
+    const std::vector<std::string> _roots;
+    const Update _update;
+    std::atomic<unsigned> _generation = 0; ///< of the query
+    std::atomic<bool> _findIsWaiting = false;
+    std::mutex _mutex; ///< guards what follows
+    Index _index; ///< null until names are known
+    std::string _query;
+    bool _isComplete = false;
+};
+
+IndexedNameSearch::IndexedNameSearch(
+    std::shared_ptr<platform::Dispatch> dispatch, std::shared_ptr<const MimeTypeRegistry> types)
+    : _store(std::make_shared<Store>(std::move(dispatch), std::move(types)))
+{
+}
+
+IndexedNameSearch::~IndexedNameSearch() = default;
+
+std::shared_ptr<platform::NameSearchSession> IndexedNameSearch::begin(std::vector<Url> folders, Update update)
+{
+    const auto session = std::make_shared<Session>(_store, pathsOf(folders), std::move(update));
+    session->refreshSoon();
+    return session;
+}
+
+} // namespace host::system

@@ -1,0 +1,150 @@
+#include "host/system/search/NameGathering.h"
+
+#include "host/system/files/DirectoryReader.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+
+#include <algorithm>
+#include <ctime>
+#include <optional>
+#include <utility>
+
+namespace host::system {
+
+using platform::FolderEntryKind;
+
+namespace {
+
+constexpr std::size_t firstProgress = 20'000; ///< items, read in well under a tenth of a second
+constexpr std::size_t progressGrowth = 4; ///< so that all copies together cost a third of the last one
+constexpr std::int64_t nanoseconds = 1'000'000'000;
+/// The clock of file times moves in steps of up to ten milliseconds: a folder that was modified so shortly
+/// before it was read may change again without a new time.
+constexpr std::int64_t unsettled = nanoseconds / 10;
+
+std::int64_t now()
+{
+    timespec time{};
+    ::clock_gettime(CLOCK_REALTIME, &time);
+    return time.tv_sec * nanoseconds + time.tv_nsec;
+}
+
+/// 0 when the folder cannot be looked at.
+std::int64_t modificationTime(const FileDescriptor& folder)
+{
+    struct stat status { };
+    if (::fstat(folder.get(), &status) != 0)
+        return 0;
+    return status.st_mtim.tv_sec * nanoseconds + status.st_mtim.tv_nsec;
+}
+
+} // namespace
+
+NameGathering::NameGathering(const EntryClassifier& classifier, const NameFolding& folding,
+    std::shared_ptr<const NameIndex> earlier, Handlers handlers)
+    : _classifier(classifier)
+    , _folding(folding)
+    , _earlier(std::move(earlier))
+    , _handlers(std::move(handlers))
+    , _nextProgress(firstProgress)
+{
+    if (!_earlier)
+        return;
+    // What an earlier search shows must not shrink first.
+    _nextProgress = std::max(firstProgress, _earlier->itemCount());
+    for (const auto& folder : _earlier->folders())
+        _earlierFolders.emplace(folder.path, &folder);
+}
+
+NameIndex NameGathering::gather(const std::vector<std::string>& roots)
+{
+    for (const auto& root : roots) {
+        enter(openFolder(root), root);
+        while (!_levels.empty() && !_handlers.isCancelled())
+            descend();
+        _levels.clear();
+    }
+    return _builder.finish();
+}
+
+void NameGathering::enter(FileDescriptor descriptor, std::string path)
+{
+    if (!descriptor)
+        return;
+    const auto modified = modificationTime(descriptor);
+    const bool isSettled = now() - modified > unsettled;
+    const auto known = _earlierFolders.find(path);
+    const bool isKept =
+        known != _earlierFolders.end() && modified != 0 && known->second->modified == modified;
+    Level level{path, std::move(descriptor), {}};
+    _builder.beginFolder(std::move(path), isSettled ? modified : 0);
+    if (isKept)
+        copy(*known->second, level.subfolders);
+    else
+        read(level.descriptor, level.subfolders);
+    ++(isKept ? _keptFolders : _readFolders);
+    _levels.push_back(std::move(level));
+    reportProgress();
+}
+
+void NameGathering::descend()
+{
+    auto& level = _levels.back();
+    if (level.subfolders.empty() || _levels.size() >= deepestLevel) {
+        _levels.pop_back();
+        return;
+    }
+    const auto name = std::move(level.subfolders.back());
+    level.subfolders.pop_back();
+    enter(openFolderAt(level.descriptor, name), level.path + '/' + name);
+}
+
+void NameGathering::copy(const NameIndex::Folder& folder, std::vector<std::string>& subfolders)
+{
+    for (auto number = folder.firstItem; number < folder.firstItem + folder.itemCount; ++number) {
+        const auto item = _earlier->item(number);
+        _builder.append(item);
+        if (item.kind == FolderEntryKind::Folder && !item.isPromise)
+            subfolders.emplace_back(item.name);
+    }
+}
+
+void NameGathering::read(const FileDescriptor& descriptor, std::vector<std::string>& subfolders)
+{
+    std::vector<std::pair<std::string, FolderEntryKind>> promised;
+    DirectoryReader reader(descriptor);
+    while (const auto found = reader.next()) {
+        const auto type = found->type ? found->type : typeOfEntry(descriptor, found->name);
+        const auto entry = type ? _classifier.classify(found->name, *type) : std::nullopt;
+        if (entry && entry->isPromise)
+            promised.emplace_back(entry->name, entry->kind);
+        else if (entry)
+            append(*entry, subfolders);
+    }
+    for (const auto& [name, kind] : promised) {
+        struct stat status { };
+        // An item that is here counts, not the promise beside it.
+        if (::fstatat(descriptor.get(), name.c_str(), &status, AT_SYMLINK_NOFOLLOW) != 0)
+            append({name, kind, true}, subfolders);
+    }
+}
+
+void NameGathering::append(const platform::FolderEntry& entry, std::vector<std::string>& subfolders)
+{
+    _folded.clear();
+    _folding.append(entry.name, _folded);
+    _builder.append({entry.name, _folded, entry.kind, entry.isPromise});
+    if (entry.kind == FolderEntryKind::Folder && !entry.isPromise)
+        subfolders.emplace_back(entry.name);
+}
+
+void NameGathering::reportProgress()
+{
+    if (_builder.itemCount() < _nextProgress)
+        return;
+    _nextProgress = _builder.itemCount() * progressGrowth;
+    _handlers.progress(_builder.soFar());
+}
+
+} // namespace host::system

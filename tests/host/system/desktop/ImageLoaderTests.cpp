@@ -1,0 +1,140 @@
+#include "host/system/desktop/GdkPixbufImageLoader.h"
+#include "host/system/desktop/JpegEnd.h"
+#include "tests/support/TemporaryDirectory.h"
+
+#include <gtest/gtest.h>
+#include <sys/stat.h>
+
+using namespace platform;
+using host::system::GdkPixbufImageLoader;
+using testing_support::TemporaryDirectory;
+
+namespace {
+
+/// A picture whose left half is red and whose right half is blue.
+std::string twoColors(int width, int height)
+{
+    std::string file = "P6 " + std::to_string(width) + ' ' + std::to_string(height) + " 255\n";
+    for (int i = 0; i < width * height; ++i)
+        file += i % width < width / 2 ? std::string("\xFF\0\0", 3) : std::string("\0\0\xFF", 3);
+    return file;
+}
+
+struct ErrorRow {
+    const char* name;
+    std::string content;
+    std::string_view domain;
+    int code;
+};
+
+TEST(ImageLoader, KeepsColorsAndMakesLargePicturesSmaller)
+{
+    const TemporaryDirectory folder;
+    const auto path = folder.write("wide.ppm", twoColors(400, 100));
+    const GdkPixbufImageLoader loader;
+
+    const auto whole = loader.load(path, {.maxWidth = 400, .maxHeight = 400, .scale = 2});
+    ASSERT_TRUE(whole);
+    EXPECT_EQ(whole->pixelWidth(), 400);
+    EXPECT_EQ(whole->size(), (Size{200, 50}));
+    EXPECT_EQ(whole->pixels().front(), 0xFFFF0000);
+    EXPECT_EQ(whole->pixels().back(), 0xFF0000FF);
+
+    const auto small = loader.load(path, {.maxWidth = 100, .maxHeight = 10});
+    ASSERT_TRUE(small);
+    EXPECT_EQ(small->pixelWidth(), 40);
+    EXPECT_EQ(small->pixelHeight(), 10);
+}
+
+TEST(ImageLoader, SaysWhyAPictureCannotBeShown)
+{
+    const TemporaryDirectory folder;
+    const GdkPixbufImageLoader loader;
+    const ImageLimits limits{.maxFileBytes = 100'000, .maxSourcePixels = 10'000};
+    const auto damaged = static_cast<int>(ImageErrorCode::Damaged);
+    const auto tooLarge = static_cast<int>(ImageErrorCode::TooLarge);
+    const ErrorRow rows[] = {
+        {"no picture", "just words", errorDomain::image, damaged},
+        {"empty", "", errorDomain::image, damaged},
+        {"header names too many pixels", "P6 30000 30000 255\n", errorDomain::image, tooLarge},
+        {"too many bytes", std::string(100'001, ' '), errorDomain::image, tooLarge},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        const auto loaded = loader.load(folder.write("picture.ppm", row.content), limits);
+        ASSERT_TRUE(loaded.error);
+        EXPECT_EQ(loaded.error->domain(), row.domain);
+        EXPECT_EQ(loaded.error->code(), row.code);
+    }
+    const auto missing = loader.load(folder.at("missing.png"), limits);
+    ASSERT_TRUE(missing.error);
+    EXPECT_TRUE(missing.error->is(FileErrorCode::NoSuchFile));
+}
+
+TEST(ImageLoader, ReadsTheFramesOfAnAnimation)
+{
+    using namespace std::string_literals;
+    // One pixel that is black for 200 milliseconds and white for 10.
+    const auto frame = [](char delay, char color) {
+        return "\x21\xF9\4\0"s + delay + "\0\0\0"s + "\x2C\0\0\0\0\1\0\1\0\0\2\2"s + color + "\1\0"s;
+    };
+    const auto gif = "GIF89a\1\0\1\0\x80\0\0\0\0\0\xFF\xFF\xFF"s + frame(20, '\x44') + frame(1, '\x4C') + ";";
+    const TemporaryDirectory folder;
+    const auto path = folder.write("moving.gif", gif);
+    const auto never = [] { return false; };
+    const GdkPixbufImageLoader loader;
+    const auto picture = loader.loadPicture(path, {}, never);
+    ASSERT_TRUE(picture);
+    ASSERT_EQ(picture->frames.size(), 2U);
+    EXPECT_EQ(picture->frames[0].image.pixels()[0], 0xFF000000);
+    EXPECT_EQ(picture->frames[1].image.pixels()[0], 0xFFFFFFFF);
+    EXPECT_EQ(picture->frames[0].milliseconds, 200);
+    EXPECT_FALSE(picture->breaksOff);
+
+    EXPECT_EQ(loader.loadPicture(path, {.maxAnimationBytes = 7}, never)->frames.size(), 1U);
+    const auto cancelled = loader.loadPicture(path, {}, [] { return true; });
+    EXPECT_EQ(cancelled.error->code(), static_cast<int>(ImageErrorCode::Cancelled));
+
+    // Broken off within its second frame.
+    const auto half = loader.loadPicture(folder.write("half.gif", gif.substr(0, gif.size() - 6)), {}, never);
+    ASSERT_TRUE(half);
+    EXPECT_TRUE(half->breaksOff);
+}
+
+struct EndRow {
+    const char* name;
+    std::string_view bytes;
+    bool isMissing;
+};
+
+TEST(JpegEnd, IsFoundBehindThePictureOnly)
+{
+    using namespace std::string_view_literals;
+    const EndRow rows[] = {
+        {"whole", "\xFF\xD8\xFF\xE0\0\4ab\xFF\xDA\0\2pixels\xFF\xD9"sv, false},
+        {"whole, with more behind it", "\xFF\xD8\xFF\xDA\0\2\xFF\xD9 and a film"sv, false},
+        {"fill bytes before a mark", "\xFF\xD8\xFF\xFF\xFF\xDA\0\2\xFF\xD9"sv, false},
+        {"broken off", "\xFF\xD8\xFF\xE0\0\4ab\xFF\xDA\0\2pixels\xFF"sv, true},
+        {"with an end in its small picture alone", "\xFF\xD8\xFF\xE1\0\4\xFF\xD9\xFF\xDA\0\2pixels"sv, true},
+        {"broken off within a segment", "\xFF\xD8\xFF\xE1\1\0short"sv, true},
+        {"another format", "GIF89a"sv, false},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        host::system::JpegEnd whole, pieces;
+        whole.feed(row.bytes);
+        for (const char byte : row.bytes)
+            pieces.feed({&byte, 1});
+        EXPECT_EQ(whole.isMissing(), row.isMissing);
+        EXPECT_EQ(pieces.isMissing(), row.isMissing);
+    }
+}
+
+TEST(ImageLoader, DoesNotWaitForAPipe)
+{
+    const TemporaryDirectory folder;
+    ASSERT_EQ(::mkfifo(folder.at("pipe.png").c_str(), 0600), 0);
+    EXPECT_TRUE(GdkPixbufImageLoader().load(folder.at("pipe.png"), {}).error);
+}
+
+} // namespace
