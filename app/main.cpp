@@ -1,6 +1,6 @@
 #include "app/AppDelegate.h"
-#include "host/drive/LocalActivityHandOver.h"
-#include "host/drive/LocalCloudDocumentService.h"
+#include "host/drive/service/LocalActivityHandOver.h"
+#include "host/drive/service/LocalCloudDocumentService.h"
 #include "host/gtk/DesktopSharing.h"
 #include "host/gtk/LaunchContext.h"
 #include "host/gtk/MakeApplication.h"

@@ -1,4 +1,4 @@
-#include "host/drive/LocalCloudDocumentService.h"
+#include "host/drive/service/LocalCloudDocumentService.h"
 #include "host/system/coordination/LocalFileCoordinator.h"
 #include "host/system/desktop/JournalLogSink.h"
 #include "host/system/desktop/MimeTypeRegistry.h"

@@ -2,8 +2,8 @@
 // open and one read of the attribute. The drive holds as many documents with an identifier as the argument
 // says; they are looked up in an order that has nothing to do with their places.
 
-#include "host/drive/ItemFacts.h"
-#include "host/drive/LocalDocumentIdentifiers.h"
+#include "host/drive/identity/LocalDocumentIdentifiers.h"
+#include "host/drive/records/ItemFacts.h"
 #include "host/system/queues/GLibDispatch.h"
 
 #include <fcntl.h>

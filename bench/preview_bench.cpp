@@ -2,7 +2,7 @@
 // million pixels the bare decoding to the screen's size, for a PDF document of 500 pages the bare drawing of
 // page one.
 
-#include "host/drive/LocalCloudDocumentService.h"
+#include "host/drive/service/LocalCloudDocumentService.h"
 #include "host/previews/PopplerDocuments.h"
 #include "host/system/coordination/LocalFileCoordinator.h"
 #include "host/system/desktop/GdkPixbufImageLoader.h"

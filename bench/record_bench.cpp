@@ -1,8 +1,8 @@
 // Reading an item into its record, beside the system calls that nobody can do without: for a local file one
 // statx and one getxattr, for a promise one statx that fails and the promise's file read once.
 
-#include "host/drive/LocalCloudDocumentService.h"
-#include "host/drive/PromiseRecord.h"
+#include "host/drive/records/PromiseRecord.h"
+#include "host/drive/service/LocalCloudDocumentService.h"
 #include "host/system/coordination/LocalFileCoordinator.h"
 #include "host/system/desktop/MimeTypeRegistry.h"
 #include "host/system/desktop/TypePreviewSupport.h"

@@ -1,5 +1,5 @@
-#include "host/drive/AccountRecord.h"
-#include "host/drive/SmallFile.h"
+#include "host/drive/records/AccountRecord.h"
+#include "host/drive/records/SmallFile.h"
 #include "host/drive/sample/SampleDrive.h"
 #include "host/system/files/AtomicWrite.h"
 

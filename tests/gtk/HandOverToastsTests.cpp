@@ -1,8 +1,8 @@
 #include "host/gtk/HandOverToasts.h"
 
 #include "WindowFixture.h"
-#include "host/drive/Bookmark.h"
-#include "host/drive/LocalActivityHandOver.h"
+#include "host/drive/identity/Bookmark.h"
+#include "host/drive/service/LocalActivityHandOver.h"
 #include "tests/support/DriveFixture.h"
 
 #include <filesystem>

@@ -1,8 +1,8 @@
 #include "tests/support/DriveFixture.h"
 
-#include "host/drive/AccountRecord.h"
-#include "host/drive/ItemFacts.h"
-#include "host/drive/LinkRecords.h"
+#include "host/drive/records/AccountRecord.h"
+#include "host/drive/records/ItemFacts.h"
+#include "host/drive/records/LinkRecords.h"
 #include "host/previews/PopplerDocuments.h"
 #include "host/previews/UchardetDecoder.h"
 #include "host/system/coordination/LocalFileCoordinator.h"

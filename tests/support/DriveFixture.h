@@ -1,8 +1,8 @@
 #pragma once
 
-#include "host/drive/LocalActivityHandOver.h"
-#include "host/drive/LocalCloudDocumentService.h"
-#include "host/drive/PromiseRecord.h"
+#include "host/drive/records/PromiseRecord.h"
+#include "host/drive/service/LocalActivityHandOver.h"
+#include "host/drive/service/LocalCloudDocumentService.h"
 #include "platform/FileCoordinator.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Services.h"

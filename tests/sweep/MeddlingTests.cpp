@@ -1,4 +1,4 @@
-#include "host/drive/PromiseRecord.h"
+#include "host/drive/records/PromiseRecord.h"
 #include "tests/sweep/support/SweepFixture.h"
 
 #include <gmock/gmock.h>

@@ -1,8 +1,8 @@
 #include "host/drive/sample/SampleDrive.h"
 
-#include "host/drive/AccountRecord.h"
-#include "host/drive/ContainerRecord.h"
-#include "host/drive/LinkRecords.h"
+#include "host/drive/records/AccountRecord.h"
+#include "host/drive/records/ContainerRecord.h"
+#include "host/drive/records/LinkRecords.h"
 #include "host/drive/sample/SampleMedia.h"
 #include "host/drive/sample/SamplePages.h"
 #include "host/drive/sample/SamplePictures.h"

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/drive/DriveLayout.h"
+#include "host/drive/records/DriveLayout.h"
 #include "platform/Error.h"
 
 namespace host::drive::sample {

@@ -1,7 +1,7 @@
 #include "host/drive/sample/SampleWriter.h"
 
-#include "host/drive/ItemFacts.h"
-#include "host/drive/SmallFile.h"
+#include "host/drive/records/ItemFacts.h"
+#include "host/drive/records/SmallFile.h"
 #include "host/system/files/FileDescriptor.h"
 #include "host/system/files/PosixFileSystem.h"
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "host/drive/DriveLayout.h"
-#include "host/drive/PromiseRecord.h"
+#include "host/drive/records/DriveLayout.h"
+#include "host/drive/records/PromiseRecord.h"
 #include "platform/Error.h"
 
 #include <functional>

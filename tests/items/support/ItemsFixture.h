@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/drive/ItemFacts.h"
+#include "host/drive/records/ItemFacts.h"
 #include "platform/Localization.h"
 #include "platform/PreviewSupport.h"
 #include "tests/items/support/DecoratedCloud.h"

@@ -1,6 +1,6 @@
 #include "tests/screens/support/ComponentsFixture.h"
 
-#include "host/drive/ContainerRecord.h"
+#include "host/drive/records/ContainerRecord.h"
 #include "kit/AlertController.h"
 #include "kit/ListView.h"
 #include "kit/NavigationItem.h"

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/drive/ContainerRecord.h"
+#include "host/drive/records/ContainerRecord.h"
 #include "kit/ListView.h"
 #include "kit/ListViewObserver.h"
 #include "tests/screens/support/ComponentsFixture.h"

@@ -1,8 +1,8 @@
 #include "tests/sweep/support/SweepFixture.h"
 
-#include "host/drive/LocalCloudStore.h"
-#include "host/drive/PromiseRecord.h"
-#include "host/drive/Recovery.h"
+#include "host/drive/changes/LocalCloudStore.h"
+#include "host/drive/changes/Recovery.h"
+#include "host/drive/records/PromiseRecord.h"
 
 #include <sys/syscall.h>
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/drive/DriveLayout.h"
+#include "host/drive/records/DriveLayout.h"
 #include "tests/support/TemporaryDirectory.h"
 #include "tests/sweep/support/FaultyRun.h"
 

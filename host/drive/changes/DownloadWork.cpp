@@ -1,0 +1,139 @@
+#include "host/drive/changes/DownloadWork.h"
+
+#include "host/drive/changes/HeldItem.h"
+#include "host/drive/changes/NewFile.h"
+#include "host/drive/changes/PromiseFile.h"
+#include "host/drive/records/ItemFacts.h"
+#include "host/drive/records/SmallFile.h"
+#include "host/system/files/PosixFileSystem.h"
+#include "host/system/texts/Translate.h"
+
+#include <fcntl.h>
+#include <sys/xattr.h>
+
+#include <cerrno>
+
+namespace host::drive {
+
+using host::system::FileDescriptor;
+using platform::Error;
+using platform::FileErrorCode;
+
+namespace {
+
+constexpr std::int64_t nanosecondsPerSecond = 1'000'000'000;
+
+std::string joined(const std::vector<std::string>& tags)
+{
+    std::string text;
+    for (const auto& tag : tags)
+        text.append(text.empty() ? "" : ",").append(tag);
+    return text;
+}
+
+/// What the promise says beside the content becomes the file's own.
+int mark(const FileDescriptor& file, const PromiseRecord& promise)
+{
+    const auto role = !promise.role                        ? ""
+        : *promise.role == platform::SharedItemRole::Owner ? "owner"
+                                                           : "participant";
+    const auto identifier = promise.documentIdentifier;
+    const std::pair<const char*, std::string> marks[] = {{itemMark::tags, joined(promise.tags)},
+        {itemMark::shared, promise.shared ? "1" : ""}, {itemMark::role, role},
+        {itemMark::documentIdentifier, identifier != 0 ? std::to_string(identifier) : ""},
+        {system::hiddenExtensionAttribute, promise.extensionHidden ? "1" : ""},
+        {itemMark::status, "current"}};
+    for (const auto& [name, value] : marks) {
+        if (!value.empty() && ::fsetxattr(file.get(), name, value.data(), value.size(), 0) != 0)
+            return errno;
+    }
+    if (!promise.modified)
+        return 0;
+    auto seconds = promise.modified->nanoseconds / nanosecondsPerSecond;
+    auto rest = promise.modified->nanoseconds % nanosecondsPerSecond;
+    if (rest < 0) {
+        --seconds;
+        rest += nanosecondsPerSecond;
+    }
+    const timespec times[] = {{0, UTIME_OMIT}, {seconds, rest}};
+    return ::futimens(file.get(), times) == 0 ? 0 : errno;
+}
+
+/// A download that ends short must not take the place of the document.
+int checkSize(const FileDescriptor& file, const PromiseRecord& promise)
+{
+    struct stat found;
+    if (::fstat(file.get(), &found) != 0)
+        return errno;
+    return promise.size && static_cast<std::uint64_t>(found.st_size) < *promise.size ? EIO : 0;
+}
+
+/// One that was deleted or moved away while its content came must not show again where it was.
+int settlePromise(const DriveLayout& layout, const DriveEntry& entry, CloudStore& store,
+    const platform::ItemVersion& published)
+{
+    struct stat found;
+    if (::fstatat(entry.folder.get(), entry.promiseName().c_str(), &found, AT_SYMLINK_NOFOLLOW) == 0) {
+        dropRedundantPromise(entry, store);
+        return 0;
+    }
+    std::optional<HeldItem> held;
+    if (HeldItem::take(layout, entry, entry.name, held) == 0
+        && ::fstatat(held->folder().get(), held->name().c_str(), &found, AT_SYMLINK_NOFOLLOW) == 0
+        && isSameContent(published, versionOf(found)))
+        held->remove(nullptr);
+    return ENOENT;
+}
+
+int fetchInto(const DriveLayout& layout, CloudStore& store, const DriveEntry& entry,
+    const PromiseRecord& promise, const CloudStore::Progress& progress)
+{
+    std::optional<NewFile> file;
+    int failure = NewFile::create(layout, entry, file);
+    if (failure == 0)
+        failure = store.fetch(promise.content, file->descriptor(), progress);
+    if (failure == 0)
+        failure = checkSize(file->descriptor(), promise);
+    if (failure == 0)
+        failure = mark(file->descriptor(), promise);
+    struct stat whole;
+    if (failure == 0)
+        failure = ::fstat(file->descriptor().get(), &whole) == 0 ? 0 : errno;
+    if (failure == 0)
+        failure = file->publish(entry, entry.name);
+    return failure == 0 ? settlePromise(layout, entry, store, versionOf(whole)) : failure;
+}
+
+Error missingContent(const std::string& path)
+{
+    return cloudError(CloudErrorCode::MissingContent, path,
+        system::textKey("The content of the document isn’t in the cloud."));
+}
+
+} // namespace
+
+std::optional<Error> bringHere(const DriveLayout& layout, CloudStore& store, const std::string& path,
+    const CloudStore::Progress& progress)
+{
+    const auto item = LocatedItem::locate(layout, path);
+    if (!item || !item->isPromise())
+        return item.error;
+    const auto promise = readPromise(item->entry);
+    if (!promise)
+        return promise.error;
+    if (promise->kind != PromiseRecord::Kind::File)
+        return Error(FileErrorCode::Unsupported);
+    if (promise->content.empty())
+        return missingContent(path);
+    const int failure = fetchInto(layout, store, item->entry, *promise, progress);
+    if (failure == 0)
+        return std::nullopt;
+    // What is missing may be the promise or what it stands for.
+    struct stat found;
+    std::string name;
+    if (failure == ENOENT && item->entry.find(name, found) == 0)
+        return missingContent(path);
+    return itemError(failure, path);
+}
+
+} // namespace host::drive

@@ -1,0 +1,118 @@
+#include "host/drive/changes/DriveEntry.h"
+
+#include "host/drive/records/BeneathRoot.h"
+#include "host/drive/records/PromiseRecord.h"
+#include "host/drive/records/SmallFile.h"
+#include "host/system/files/SystemErrors.h"
+
+#include <fcntl.h>
+#include <signal.h>
+
+#include <atomic>
+#include <cerrno>
+#include <charconv>
+#include <cstdio>
+
+namespace host::drive {
+
+using host::system::FileDescriptor;
+using platform::ItemVersion;
+using platform::Result;
+
+Result<DriveEntry> DriveEntry::open(const DriveLayout& layout, const std::string& path)
+{
+    const auto& root = layout.documents();
+    if (path.find('\0') != std::string::npos)
+        return itemError(EILSEQ, path);
+    if (!path.starts_with(root + '/') || path.size() == root.size() + 1)
+        return itemError(EXDEV, path);
+    const auto slash = path.rfind('/');
+    const auto parent = slash == root.size() ? "." : path.substr(root.size() + 1, slash - root.size() - 1);
+    auto name = path.substr(slash + 1);
+    if (name.empty() || name == "." || name == "..")
+        return itemError(EINVAL, path);
+    auto folder = openBeneath(root, parent, O_PATH | O_DIRECTORY);
+    if (!folder)
+        return host::system::systemError(errno, path.substr(0, slash));
+    return DriveEntry{std::move(folder), std::move(name), path};
+}
+
+int DriveEntry::status(struct stat& result) const
+{
+    return ::fstatat(folder.get(), name.c_str(), &result, AT_SYMLINK_NOFOLLOW) == 0 ? 0 : errno;
+}
+
+std::string DriveEntry::promiseName() const
+{
+    return PromiseRecord::pathFor(name);
+}
+
+int DriveEntry::find(std::string& physicalName, struct stat& result) const
+{
+    physicalName = name;
+    const int failure = status(result);
+    if (failure != ENOENT)
+        return failure;
+    physicalName = promiseName();
+    return ::fstatat(folder.get(), physicalName.c_str(), &result, AT_SYMLINK_NOFOLLOW) == 0 ? 0 : failure;
+}
+
+Result<LocatedItem> LocatedItem::locate(const DriveLayout& layout, const std::string& path)
+{
+    auto entry = DriveEntry::open(layout, path);
+    if (!entry)
+        return *entry.error;
+    LocatedItem item{std::move(*entry.value), {}, {}};
+    if (const int failure = item.entry.find(item.name, item.found); failure != 0)
+        return itemError(failure, path);
+    return item;
+}
+
+bool isSameContent(const ItemVersion& a, const ItemVersion& b)
+{
+    auto renamed = b;
+    renamed.changed = a.changed;
+    return a == renamed;
+}
+
+int renameEntry(
+    const FileDescriptor& from, const std::string& name, const FileDescriptor& to, const std::string& newName)
+{
+    const int done = ::renameat2(from.get(), name.c_str(), to.get(), newName.c_str(), RENAME_NOREPLACE);
+    return done == 0 ? 0 : errno;
+}
+
+int syncFolder(const FileDescriptor& folder)
+{
+    // A descriptor that only names a folder cannot be synced.
+    const FileDescriptor readable(::openat(folder.get(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    return readable && ::fsync(readable.get()) == 0 ? 0 : errno;
+}
+
+FileDescriptor openOwnFolder(const std::string& path)
+{
+    if (::mkdir(path.c_str(), S_IRWXU) != 0 && errno != EEXIST)
+        return {};
+    return FileDescriptor(::open(path.c_str(), O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
+}
+
+std::string uniqueName(const char* prefix)
+{
+    static std::atomic<unsigned> counter = 0;
+    timespec now{};
+    clock_gettime(CLOCK_REALTIME, &now);
+    char name[96];
+    std::snprintf(name, sizeof name, "%s%x-%lx%lx-%x", prefix, static_cast<unsigned>(getpid()),
+        static_cast<unsigned long>(now.tv_sec), static_cast<unsigned long>(now.tv_nsec), counter++);
+    return name;
+}
+
+bool isProcessGone(const std::string& uniqueName)
+{
+    int process = 0;
+    const char* begin = uniqueName.data() + uniqueName.find('-') + 1;
+    std::from_chars(begin, uniqueName.data() + uniqueName.size(), process, 16);
+    return process > 0 && ::kill(process, 0) != 0 && errno == ESRCH;
+}
+
+} // namespace host::drive

@@ -1,0 +1,62 @@
+#pragma once
+
+#include "host/drive/records/DriveLayout.h"
+#include "host/system/files/FileDescriptor.h"
+#include "host/system/files/FileVersion.h"
+#include "platform/FileSystem.h"
+
+#include <sys/stat.h>
+
+#include <string>
+
+namespace host::drive {
+
+/// A name in an open folder of the drive. What is done by it stays in that very folder, whatever others do to
+/// the path meanwhile.
+struct DriveEntry {
+    host::system::FileDescriptor folder; ///< opened with O_PATH
+    std::string name;
+    std::string path; ///< for errors only
+
+    /// Opens the folder of a path below the documents area without following any link. Errors: EXDEV for a
+    /// path that lies elsewhere or is the area itself, else why the folder cannot be had.
+    static platform::Result<DriveEntry> open(const DriveLayout& layout, const std::string& path);
+
+    /// What the name is now, a link not followed; answers 0 or the errno.
+    int status(struct stat& result) const;
+    /// The same entry's promise.
+    std::string promiseName() const;
+    /// The name on disk that stands for the item, the item's own or its promise's, and what it is now.
+    /// Answers 0 or the errno.
+    int find(std::string& physicalName, struct stat& result) const;
+};
+
+/// An item that was found: the name on disk that stands for it, and what that was.
+struct LocatedItem {
+    DriveEntry entry;
+    std::string name;
+    struct stat found { };
+
+    /// Errors: as DriveEntry::open(), and FileErrorCode::NoSuchItem where neither item nor promise lies.
+    static platform::Result<LocatedItem> locate(const DriveLayout& layout, const std::string& path);
+    bool isPromise() const { return name != entry.name; }
+};
+
+using host::system::versionOf;
+/// Whether both are one item of one content; a rename in between changes no more than the time of change.
+bool isSameContent(const platform::ItemVersion& a, const platform::ItemVersion& b);
+
+/// Renames without replacing anything; answers 0 or the errno (EEXIST).
+int renameEntry(const host::system::FileDescriptor& from, const std::string& name,
+    const host::system::FileDescriptor& to, const std::string& newName);
+/// Brings a folder's names to the disk; answers 0 or the errno.
+int syncFolder(const host::system::FileDescriptor& folder);
+/// Opens a folder of the drive's own, which is made when it is missing and which the user alone may enter. On
+/// failure errno tells why.
+host::system::FileDescriptor openOwnFolder(const std::string& path);
+/// A name that nothing has yet in any folder: a prefix, the process, the time, a number.
+std::string uniqueName(const char* prefix);
+/// Whether the process that made such a name is known to be gone.
+bool isProcessGone(const std::string& uniqueName);
+
+} // namespace host::drive

@@ -1,0 +1,123 @@
+#include "host/drive/changes/HeldItem.h"
+
+#include "host/drive/changes/Discarding.h"
+#include "host/drive/records/PromiseRecord.h"
+#include "host/drive/records/SmallFile.h"
+#include "platform/Log.h"
+
+#include <fcntl.h>
+
+#include <cerrno>
+
+namespace host::drive {
+
+using host::system::FileDescriptor;
+
+namespace {
+
+bool isOnOneFileSystem(const FileDescriptor& a, const FileDescriptor& b)
+{
+    struct stat first, second;
+    return ::fstat(a.get(), &first) == 0 && ::fstat(b.get(), &second) == 0 && first.st_dev == second.st_dev;
+}
+
+/// A promise is known by its name, held or not.
+std::string heldName(const std::string& name)
+{
+    auto held = uniqueName(WorkRecord::heldPrefix);
+    if (PromiseRecord::itemPathFor(name))
+        held += PromiseRecord::suffix;
+    return held;
+}
+
+} // namespace
+
+HeldItem::HeldItem(HeldItem&& other) noexcept
+    : _origin(std::move(other._origin))
+    , _aside(std::move(other._aside))
+    , _record(std::move(other._record))
+    , _originName(std::move(other._originName))
+    , _name(std::move(other._name))
+    , _path(std::move(other._path))
+    , _isAside(other._isAside)
+    , _isThere(std::exchange(other._isThere, false))
+{
+}
+
+HeldItem::~HeldItem()
+{
+    if (_isThere)
+        putBack();
+}
+
+int HeldItem::take(const DriveLayout& layout, const DriveEntry& entry, const std::string& name,
+    std::optional<HeldItem>& held, const std::string& copy)
+{
+    HeldItem item;
+    item._aside = openOwnFolder(layout.held());
+    item._origin = FileDescriptor(::fcntl(entry.folder.get(), F_DUPFD_CLOEXEC, 0));
+    if (!item._aside || !item._origin)
+        return errno;
+    item._isAside = isOnOneFileSystem(item._aside, item._origin);
+    item._originName = name;
+    item._path = entry.path;
+    item._name = heldName(name);
+    const auto origin = entry.path.substr(0, entry.path.rfind('/') + 1);
+    const auto working = (item._isAside ? layout.held() + '/' : origin) + item._name;
+    if (const int failure = WorkRecord::write(layout, {origin + name, working, copy}, item._record);
+        failure != 0)
+        return failure;
+    if (const int failure = renameEntry(item._origin, name, item.folder(), item._name); failure != 0)
+        return failure;
+    item._isThere = true;
+    held.emplace(std::move(item));
+    return 0;
+}
+
+int HeldItem::decide(const char* prefix)
+{
+    auto decided = prefix + _name.substr(std::string_view(WorkRecord::heldPrefix).size());
+    if (const int failure = renameEntry(folder(), _name, folder(), decided); failure != 0)
+        return failure;
+    _name = std::move(decided);
+    return syncFolder(_origin);
+}
+
+int HeldItem::remove(CloudStore* store)
+{
+    static constexpr platform::Operation op{"-[HeldItem remove]"};
+    int failure = checkRemovable(folder(), _name);
+    if (failure == 0)
+        failure = decide(store ? WorkRecord::gonePrefix : WorkRecord::movedPrefix);
+    const auto discarded = failure == 0 ? discardTree(folder(), _name, store, failure) : Discarded::Nothing;
+    if (discarded == Discarded::Nothing) {
+        putBack();
+        return failure;
+    }
+    _isThere = false;
+    if (discarded == Discarded::Something) {
+        op.warning("Not all of %@ could be removed yet: %@", _path, itemError(failure, _path));
+        _record->keep();
+    }
+    return 0;
+}
+
+void HeldItem::putBack()
+{
+    static constexpr platform::Operation op{"-[HeldItem putBack]"};
+    _isThere = false;
+    const int failure = renameEntry(folder(), _name, _origin, _originName);
+    if (failure == 0)
+        return;
+    // Someone saved a new one meanwhile, or the folder is gone: both are kept. Under a name that says that
+    // it is to be removed it would not be.
+    if (!_name.starts_with(WorkRecord::heldPrefix)) {
+        auto undecided = WorkRecord::heldPrefix + _name.substr(_name.find('-') + 1);
+        if (renameEntry(folder(), _name, folder(), undecided) == 0)
+            _name = std::move(undecided);
+    }
+    op.warning("Cannot put back %@, kept as %@: %@", _path, _name, itemError(failure, _path));
+    _record->keep();
+}
+
+} // namespace host::drive

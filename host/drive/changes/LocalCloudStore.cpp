@@ -1,0 +1,128 @@
+#include "host/drive/changes/LocalCloudStore.h"
+
+#include "host/drive/changes/TreeCopy.h"
+#include "host/drive/records/SmallFile.h"
+#include "host/system/files/DirectoryReader.h"
+
+#include <fcntl.h>
+
+#include <cerrno>
+#include <memory>
+
+namespace host::drive {
+
+using host::system::FileDescriptor;
+using platform::ItemVersion;
+
+namespace {
+
+bool isPlainName(const std::string& name)
+{
+    return !name.empty() && name != "." && name != ".."
+        && name.find_first_of(std::string_view("/\0", 2)) == std::string::npos;
+}
+
+} // namespace
+
+FileDescriptor LocalCloudStore::openFolder() const
+{
+    return FileDescriptor(::open(_layout.cloud().c_str(), O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
+}
+
+FileDescriptor LocalCloudStore::openContent(const std::string& content) const
+{
+    if (!isPlainName(content)) {
+        errno = ENOENT;
+        return {};
+    }
+    // Why the folder cannot be had stays in errno: only what is missing is nothing.
+    const auto folder = openFolder();
+    return folder ? FileDescriptor(::openat(
+               folder.get(), content.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC))
+                  : FileDescriptor();
+}
+
+int LocalCloudStore::fetch(const std::string& content, const FileDescriptor& into, const Progress& progress)
+{
+    const auto from = openContent(content);
+    struct stat found;
+    if (!from || ::fstat(from.get(), &found) != 0)
+        return errno;
+    if (!S_ISREG(found.st_mode))
+        return EOPNOTSUPP;
+    const auto total = static_cast<std::uint64_t>(found.st_size);
+    std::uint64_t done = 0;
+    const int failure = copyBytes(from, into, [&](std::uint64_t copied) {
+        done = copied;
+        return progress(copied, total) == Continue::Yes ? 0 : ECANCELED;
+    });
+    return failure != 0 ? failure : done < total ? EIO : 0;
+}
+
+int LocalCloudStore::store(const DriveEntry& document, const ItemVersion& version, const std::string& content)
+{
+    const auto folder = openOwnFolder(_layout.cloud());
+    struct stat moved;
+    if (!folder)
+        return errno;
+    if (const int failure = renameEntry(document.folder, document.name, folder, content); failure != 0)
+        return failure;
+    int failure = ::fstatat(folder.get(), content.c_str(), &moved, AT_SYMLINK_NOFOLLOW) == 0 ? 0 : errno;
+    if (failure == 0 && !isSameContent(version, versionOf(moved)))
+        failure = ECANCELED;
+    if (failure == 0)
+        failure = syncFolder(folder);
+    if (failure != 0)
+        renameEntry(folder, content, document.folder, document.name);
+    return failure;
+}
+
+int LocalCloudStore::remove(const std::string& content)
+{
+    if (!isPlainName(content))
+        return 0;
+    const auto folder = openFolder();
+    return (folder && ::unlinkat(folder.get(), content.c_str(), 0) == 0) || errno == ENOENT ? 0 : errno;
+}
+
+int LocalCloudStore::move(const std::string& content, const std::string& newContent)
+{
+    if (!isPlainName(content) || !isPlainName(newContent))
+        return ENOENT;
+    const auto folder = openFolder();
+    return folder ? renameEntry(folder, content, folder, newContent) : errno;
+}
+
+bool LocalCloudStore::holdsOtherThan(const std::string& content, const FileDescriptor& document)
+{
+    const auto file = openContent(content);
+    return file ? compareBytes(file, document) != 0 : errno != ENOENT;
+}
+
+platform::Result<std::vector<std::string>> LocalCloudStore::listChanges(platform::Date since)
+{
+    std::vector<std::string> names;
+    const auto folder = system::openFolder(_layout.cloud());
+    if (!folder && errno != ENOENT)
+        return itemError(errno, _layout.cloud());
+    if (!folder)
+        return names;
+    const auto reader = std::make_unique<system::DirectoryReader>(folder);
+    while (const auto entry = reader->next()) {
+        struct stat found;
+        // A rename into the folder sets the time of change and leaves that of the content.
+        if (::fstatat(folder.get(), entry->name.data(), &found, AT_SYMLINK_NOFOLLOW) == 0
+            && versionOf(found).changed >= since.nanoseconds)
+            names.emplace_back(entry->name);
+    }
+    if (reader->errorNumber() != 0)
+        return itemError(reader->errorNumber(), _layout.cloud());
+    return names;
+}
+
+platform::Result<StorageSpace> LocalCloudStore::quota()
+{
+    return StorageSpace::of(_layout.home());
+}
+
+} // namespace host::drive

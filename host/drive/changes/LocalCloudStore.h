@@ -1,0 +1,33 @@
+#pragma once
+
+#include "host/drive/changes/CloudStore.h"
+
+namespace host::drive {
+
+/// Contents as files of the drive's own `cloud/` folder, which is made when something is stored. A name that
+/// could lead elsewhere is no content's (ENOENT).
+class LocalCloudStore : public CloudStore {
+public:
+    explicit LocalCloudStore(DriveLayout layout)
+        : _layout(std::move(layout))
+    {
+    }
+
+    int fetch(
+        const std::string& content, const system::FileDescriptor& into, const Progress& progress) override;
+    int store(const DriveEntry& document, const platform::ItemVersion& version,
+        const std::string& content) override;
+    int remove(const std::string& content) override;
+    int move(const std::string& content, const std::string& newContent) override;
+    bool holdsOtherThan(const std::string& content, const system::FileDescriptor& document) override;
+    platform::Result<std::vector<std::string>> listChanges(platform::Date since) override;
+    platform::Result<StorageSpace> quota() override;
+
+private:
+    system::FileDescriptor openFolder() const;
+    system::FileDescriptor openContent(const std::string& content) const;
+
+    DriveLayout _layout;
+};
+
+} // namespace host::drive

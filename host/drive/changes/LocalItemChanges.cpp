@@ -1,0 +1,286 @@
+#include "host/drive/changes/LocalItemChanges.h"
+
+#include "host/drive/changes/HeldItem.h"
+#include "host/drive/changes/NewFile.h"
+#include "host/drive/changes/PromiseFile.h"
+#include "host/drive/changes/TreeCopy.h"
+#include "host/drive/records/BeneathRoot.h"
+#include "host/drive/records/ItemFacts.h"
+#include "host/drive/records/SmallFile.h"
+#include "host/system/files/SystemErrors.h"
+#include "host/system/texts/Translate.h"
+
+#include <fcntl.h>
+
+#include <cerrno>
+
+namespace host::drive {
+
+using host::system::FileDescriptor;
+using host::system::systemError;
+using platform::Error;
+using platform::FileErrorCode;
+using platform::ItemVersion;
+
+namespace {
+
+/// Whether an item or a promise has the name already; answers 0 when none has, EEXIST, or another errno.
+int checkIsFree(const DriveEntry& entry)
+{
+    std::string name;
+    struct stat found;
+    const int failure = entry.find(name, found);
+    return failure == ENOENT ? 0 : failure == 0 ? EEXIST : failure;
+}
+
+PromiseRecord promiseFor(const ItemFacts& facts, const std::string& content)
+{
+    PromiseRecord promise;
+    const auto date = [](const statx_timestamp& time) {
+        return platform::Date{time.tv_sec * 1'000'000'000 + time.tv_nsec};
+    };
+    promise.size = facts.status.stx_size;
+    promise.modified = facts.modified();
+    if (facts.status.stx_mask & STATX_BTIME)
+        promise.created = date(facts.status.stx_btime);
+    promise.shared = facts.marks.shared;
+    promise.role = facts.marks.role;
+    promise.extensionHidden = facts.marks.extensionHidden;
+    promise.documentIdentifier = facts.marks.documentIdentifier;
+    promise.tags = facts.marks.tags;
+    promise.content = content;
+    return promise;
+}
+
+/// What two refusals are called between the steps below; no step of theirs fails with them otherwise.
+constexpr int changedMeanwhile = ECANCELED;
+constexpr int ownFolder = EDEADLK;
+
+/// Whether an open folder is one of a tree's, by whatever name it was reached: a mount can give it another.
+bool holdsFolder(const TreeVersions& tree, const FileDescriptor& folder)
+{
+    struct stat found;
+    return ::fstat(folder.get(), &found) == 0 && tree.contains({found.st_dev, found.st_ino});
+}
+
+Error changeError(int errorNumber, const std::string& path)
+{
+    return errorNumber == changedMeanwhile ? Error(FileErrorCode::Cancelled) : itemError(errorNumber, path);
+}
+
+/// Makes one folder and notes it, unless it is there already.
+std::optional<Error> makeFolder(
+    const DriveLayout& layout, const std::string& path, std::vector<DriveEntry>& made)
+{
+    auto entry = DriveEntry::open(layout, path);
+    if (!entry)
+        return entry.error;
+    struct stat found;
+    int failure = checkIsFree(*entry);
+    if (failure == 0)
+        failure = ::mkdirat(entry->folder.get(), entry->name.c_str(), 0777) == 0 ? 0 : errno;
+    if (failure == EEXIST && entry->status(found) == 0 && S_ISDIR(found.st_mode))
+        return std::nullopt;
+    if (failure == 0) {
+        made.push_back(std::move(*entry.value));
+        failure = syncFolder(made.back().folder);
+    }
+    return failure == 0 ? std::nullopt : std::optional(itemError(failure, path));
+}
+
+Error intoItself(const std::string& from, const std::string& to)
+{
+    platform::PropertyDictionary info;
+    info.emplace(platform::errorKey::filePath, from);
+    info.emplace(platform::errorKey::destinationFilePath, to);
+    info.emplace(platform::errorKey::localizedDescription,
+        host::system::translated(host::system::textKey("A folder can’t be moved into itself.")));
+    return Error(platform::errorDomain::system, EINVAL, std::move(info));
+}
+
+} // namespace
+
+std::optional<ItemVersion> LocalItemChanges::versionOfItem(const std::string& path) const
+{
+    const auto item = LocatedItem::locate(_layout, path);
+    return item ? std::optional(versionOf(item->found)) : std::nullopt;
+}
+
+std::optional<Error> LocalItemChanges::createFolder(const std::string& path)
+{
+    const auto& root = _layout.documents();
+    if (!path.starts_with(root + '/'))
+        return itemError(EXDEV, path);
+    std::vector<DriveEntry> made;
+    std::optional<Error> error;
+    for (auto slash = root.size(); !error && slash != std::string::npos;) {
+        slash = path.find('/', slash + 1);
+        error = makeFolder(_layout, path.substr(0, slash), made);
+    }
+    // Those on the way that were made for nothing go again, unless somebody uses one by now.
+    for (auto entry = made.rbegin(); error && entry != made.rend(); ++entry)
+        ::unlinkat(entry->folder.get(), entry->name.c_str(), AT_REMOVEDIR);
+    return error;
+}
+
+std::optional<Error> LocalItemChanges::removeItem(
+    const std::string& path, const std::optional<ItemVersion>& unchangedSince)
+{
+    const auto item = LocatedItem::locate(_layout, path);
+    if (!item)
+        return item.error;
+    if (unchangedSince && versionOf(item->found) != *unchangedSince)
+        return Error(FileErrorCode::Cancelled);
+    if (!item->isPromise())
+        dropRedundantPromise(item->entry, *_store);
+    const int failure = removeLocated(*item);
+    return failure == 0 ? std::nullopt : std::optional(changeError(failure, path));
+}
+
+int LocalItemChanges::removeLocated(const LocatedItem& item)
+{
+    TreeVersions before, after;
+    if (const int failure = readVersions(item.entry.folder, item.name, before); failure != 0)
+        return failure;
+    std::optional<HeldItem> held;
+    int failure = HeldItem::take(_layout, item.entry, item.name, held);
+    if (failure == 0)
+        failure = readVersions(held->folder(), held->name(), after);
+    if (failure != 0)
+        return failure;
+    const auto version = versionOf(item.found);
+    const auto same = after.find({version.device, version.inode});
+    const bool isUnchanged = before == after && same != after.end() && isSameContent(version, same->second);
+    return isUnchanged ? held->remove(_store.get()) : changedMeanwhile;
+}
+
+std::optional<Error> LocalItemChanges::moveItem(const std::string& from, const std::string& to)
+{
+    const auto source = LocatedItem::locate(_layout, from);
+    const auto target = DriveEntry::open(_layout, to);
+    if (!source || !target)
+        return source ? target.error : source.error;
+    if (to.starts_with(from + '/'))
+        return intoItself(from, to);
+    if (const int failure = checkIsFree(*target); failure != 0)
+        return systemError(failure, from, to);
+    if (!source->isPromise())
+        dropRedundantPromise(source->entry, *_store);
+    const auto newName = source->isPromise() ? target->promiseName() : target->name;
+    int failure = moveWithin(*source, *target, newName);
+    if (failure == EXDEV)
+        failure = moveAcross(*source, *target, newName);
+    // To the kernel it is an invalid argument when the one name leads through the other by a mount.
+    if (failure == ownFolder || failure == EINVAL)
+        return intoItself(from, to);
+    if (failure != 0)
+        return failure == changedMeanwhile ? changeError(failure, from) : systemError(failure, from, to);
+    return std::nullopt;
+}
+
+int LocalItemChanges::moveWithin(
+    const LocatedItem& source, const DriveEntry& target, const std::string& newName)
+{
+    int failure = renameEntry(source.entry.folder, source.name, target.folder, newName);
+    if (failure != 0)
+        return failure;
+    failure = syncFolder(target.folder);
+    if (failure == 0)
+        failure = syncFolder(source.entry.folder);
+    // A move that might not outlive a power cut is none.
+    if (failure != 0)
+        renameEntry(target.folder, newName, source.entry.folder, source.name);
+    return failure;
+}
+
+int LocalItemChanges::moveAcross(
+    const LocatedItem& source, const DriveEntry& target, const std::string& newName)
+{
+    TreeVersions before;
+    if (const int failure = readVersions(source.entry.folder, source.name, before); failure != 0)
+        return failure;
+    if (holdsFolder(before, target.folder))
+        return ownFolder;
+    const auto temporary = uniqueName(WorkRecord::temporaryPrefix);
+    const auto folder = target.path.substr(0, target.path.rfind('/') + 1);
+    const auto item = source.entry.path.substr(0, source.entry.path.rfind('/') + 1) + source.name;
+    std::optional<WorkRecord> record;
+    TreeVersions copied;
+    int failure = WorkRecord::write(_layout, {item, folder + temporary, folder + newName}, record);
+    if (failure == 0)
+        failure = copyTree(source.entry.folder, source.name, target.folder, temporary);
+    if (failure == 0)
+        failure = readVersions(target.folder, temporary, copied);
+    if (failure == 0)
+        failure = renameEntry(target.folder, temporary, target.folder, newName);
+    if (failure != 0) {
+        removeTree(target.folder, temporary);
+        return failure;
+    }
+    // From here on the copy is whole and has its name: the worst that can be is that both are there.
+    failure = syncFolder(target.folder);
+    if (failure == 0)
+        failure = removeMoved(source, before, folder + newName);
+    if (failure != 0)
+        withdraw(target, newName, copied);
+    return failure;
+}
+
+void LocalItemChanges::withdraw(const DriveEntry& target, const std::string& name, const TreeVersions& copied)
+{
+    // The original is there still. A copy that somebody has changed by now is more than a copy.
+    TreeVersions found;
+    std::optional<HeldItem> held;
+    if (HeldItem::take(_layout, target, name, held) == 0
+        && readVersions(held->folder(), held->name(), found) == 0 && found == copied)
+        held->remove(nullptr);
+}
+
+int LocalItemChanges::removeMoved(
+    const LocatedItem& source, const TreeVersions& before, const std::string& copy)
+{
+    TreeVersions after;
+    std::optional<HeldItem> held;
+    int failure = HeldItem::take(_layout, source.entry, source.name, held, copy);
+    if (failure == 0)
+        failure = readVersions(held->folder(), held->name(), after);
+    if (failure == 0)
+        failure = before == after ? held->remove(nullptr) : changedMeanwhile;
+    return failure;
+}
+
+std::optional<Error> LocalItemChanges::evictItem(const std::string& path)
+{
+    const auto item = LocatedItem::locate(_layout, path);
+    if (!item || item->isPromise())
+        return item.error;
+    if (!S_ISREG(item->found.st_mode))
+        return Error(FileErrorCode::Unsupported);
+    dropRedundantPromise(item->entry, *_store);
+    const int failure = replaceByPromise(*item);
+    return failure == 0 ? std::nullopt : std::optional(changeError(failure, path));
+}
+
+int LocalItemChanges::replaceByPromise(const LocatedItem& item)
+{
+    const auto& entry = item.entry;
+    const auto content = uniqueName("content-");
+    const auto promise = promiseFor(lookAtFile(descriptorPath(entry.folder) + '/' + entry.name), content);
+    std::optional<NewFile> file;
+    int failure = NewFile::create(_layout, entry, file);
+    if (failure == 0)
+        failure = file->write(promise.toJson());
+    // While both are there the document counts; it goes only when its promise is safe on the disk.
+    if (failure == 0)
+        failure = file->publish(entry, entry.promiseName());
+    if (failure != 0)
+        return failure;
+    failure = _store->store(entry, versionOf(item.found), content);
+    struct stat found;
+    if (failure != 0 && entry.status(found) == 0)
+        dropRedundantPromise(entry, *_store);
+    // The document's old name needs no sync: come back after a power cut it would hide its promise, no more.
+    return failure;
+}
+
+} // namespace host::drive

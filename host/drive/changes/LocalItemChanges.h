@@ -1,0 +1,54 @@
+#pragma once
+
+#include "host/drive/changes/DriveEntry.h"
+#include "host/drive/changes/TreeWalk.h"
+#include "host/system/files/ItemChanges.h"
+
+#include <memory>
+
+namespace host::drive {
+
+class CloudStore;
+
+/// Changes of the drive's items, here or promised. Every step is taken by name in an open folder beneath the
+/// documents area; no link is followed, nothing that is mounted in a folder is entered, and nothing is
+/// replaced. Where a document and a promise lie side by side the document counts: a promise that adds nothing
+/// goes with it, one with another content behind it stays and shows again.
+class LocalItemChanges : public host::system::ItemChanges {
+public:
+    LocalItemChanges(DriveLayout layout, std::shared_ptr<CloudStore> store)
+        : _layout(std::move(layout))
+        , _store(std::move(store))
+    {
+    }
+
+    std::optional<platform::ItemVersion> versionOfItem(const std::string& path) const override;
+    std::optional<platform::Error> createFolder(const std::string& path) override;
+    std::optional<platform::Error> removeItem(
+        const std::string& path, const std::optional<platform::ItemVersion>& unchangedSince) override;
+    std::optional<platform::Error> moveItem(const std::string& from, const std::string& to) override;
+    platform::Result<platform::FileContent> contentToReplace(
+        const std::string& path, std::size_t maximumBytes) const override;
+    platform::Result<platform::ItemVersion> replaceContent(
+        const std::string& path, const platform::FileContent& before, std::string_view content) override;
+    std::optional<platform::Error> addDocument(
+        const std::string& path, const std::string& like, std::string_view content) override;
+
+    /// Hands the content of a downloaded document over to the store and leaves a promise. One that is
+    /// promised already is no error; folders cannot be evicted (FileErrorCode::Unsupported), nor a document
+    /// beside a promise of another content (FileErrorCode::ItemExists).
+    virtual std::optional<platform::Error> evictItem(const std::string& path);
+
+private:
+    int removeLocated(const LocatedItem& item);
+    int moveWithin(const LocatedItem& source, const DriveEntry& target, const std::string& newName);
+    int moveAcross(const LocatedItem& source, const DriveEntry& target, const std::string& newName);
+    int removeMoved(const LocatedItem& source, const TreeVersions& before, const std::string& copy);
+    void withdraw(const DriveEntry& target, const std::string& name, const TreeVersions& copied);
+    int replaceByPromise(const LocatedItem& item);
+
+    DriveLayout _layout;
+    std::shared_ptr<CloudStore> _store;
+};
+
+} // namespace host::drive

@@ -1,0 +1,130 @@
+#include "host/drive/changes/NewFile.h"
+
+#include <fcntl.h>
+
+#include <cerrno>
+
+namespace host::drive {
+
+using host::system::FileDescriptor;
+
+NewFile::NewFile(NewFile&& other) noexcept
+    : _record(std::move(other._record))
+    , _folder(std::move(other._folder))
+    , _file(std::move(other._file))
+    , _name(std::exchange(other._name, {}))
+{
+}
+
+NewFile::~NewFile()
+{
+    if (!_name.empty())
+        ::unlinkat(_folder.get(), _name.c_str(), 0);
+}
+
+int NewFile::create(const DriveLayout& layout, const DriveEntry& entry, std::optional<NewFile>& file)
+{
+    NewFile fresh;
+    const auto name = uniqueName(WorkRecord::temporaryPrefix);
+    const auto folder = entry.path.substr(0, entry.path.rfind('/') + 1);
+    if (const int failure = WorkRecord::write(layout, {entry.path, folder + name, {}}, fresh._record);
+        failure != 0)
+        return failure;
+    fresh._folder = FileDescriptor(::fcntl(entry.folder.get(), F_DUPFD_CLOEXEC, 0));
+    fresh._file = FileDescriptor(
+        ::openat(entry.folder.get(), name.c_str(), O_RDWR | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC, 0666));
+    if (!fresh._folder || !fresh._file)
+        return errno;
+    fresh._name = name;
+    file.emplace(std::move(fresh));
+    return 0;
+}
+
+int NewFile::write(std::string_view text) const
+{
+    while (!text.empty()) {
+        const auto written = ::write(_file.get(), text.data(), text.size());
+        if (written < 0 && errno != EINTR)
+            return errno;
+        text.remove_prefix(written > 0 ? static_cast<std::size_t>(written) : 0);
+    }
+    return 0;
+}
+
+int NewFile::publish(const DriveEntry& entry, const std::string& name)
+{
+    if (::fsync(_file.get()) != 0)
+        return errno;
+    if (const int failure = renameEntry(_folder, _name, entry.folder, name); failure != 0)
+        return failure;
+    const int failure = syncFolder(entry.folder);
+    // It comes back under its private name, and goes with it.
+    if (failure == 0 || renameEntry(entry.folder, name, _folder, _name) != 0)
+        _name.clear();
+    return failure;
+}
+
+/// What lies under this name after a kill is kept: it may be what another program has saved.
+int NewFile::takeHeldName(const DriveLayout& layout, const DriveEntry& entry)
+{
+    auto held = uniqueName(WorkRecord::heldPrefix);
+    const auto folder = entry.path.substr(0, entry.path.rfind('/') + 1);
+    std::optional<WorkRecord> record;
+    int failure = WorkRecord::write(layout, {entry.path, folder + held, {}}, record);
+    if (failure == 0)
+        failure = renameEntry(_folder, _name, _folder, held);
+    if (failure != 0)
+        return failure;
+    _name = std::move(held);
+    _record.emplace(std::move(*record));
+    return 0;
+}
+
+int NewFile::exchange(const DriveEntry& entry) const
+{
+    const int done =
+        ::renameat2(_folder.get(), _name.c_str(), entry.folder.get(), entry.name.c_str(), RENAME_EXCHANGE);
+    return done == 0 ? 0 : errno;
+}
+
+bool NewFile::isUnderPrivateName() const
+{
+    struct stat own, found;
+    return ::fstat(_file.get(), &own) == 0
+        && ::fstatat(_folder.get(), _name.c_str(), &found, AT_SYMLINK_NOFOLLOW) == 0
+        && own.st_dev == found.st_dev && own.st_ino == found.st_ino;
+}
+
+int NewFile::checkExchanged(const platform::ItemVersion& expected, platform::ItemVersion& written) const
+{
+    struct stat found, own;
+    if (::fstatat(_folder.get(), _name.c_str(), &found, AT_SYMLINK_NOFOLLOW) != 0
+        || ::fstat(_file.get(), &own) != 0)
+        return errno;
+    written = versionOf(own);
+    return isSameContent(versionOf(found), expected) ? 0 : ECANCELED;
+}
+
+int NewFile::replace(const DriveLayout& layout, const DriveEntry& entry,
+    const platform::ItemVersion& expected, platform::ItemVersion& written)
+{
+    if (::fsync(_file.get()) != 0)
+        return errno;
+    int failure = takeHeldName(layout, entry);
+    if (failure == 0)
+        failure = exchange(entry);
+    if (failure != 0)
+        return failure;
+    // Only what was taken out can be looked at without somebody replacing it meanwhile.
+    failure = checkExchanged(expected, written);
+    if (failure == 0)
+        failure = syncFolder(entry.folder);
+    const bool isKnown = failure == 0 || (exchange(entry) == 0 && isUnderPrivateName());
+    // What could not be looked at or removed is left to the next start.
+    if (!isKnown || ::unlinkat(_folder.get(), _name.c_str(), 0) != 0)
+        _record->keep();
+    _name.clear();
+    return failure;
+}
+
+} // namespace host::drive

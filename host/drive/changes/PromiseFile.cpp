@@ -1,0 +1,55 @@
+#include "host/drive/changes/PromiseFile.h"
+
+#include "host/drive/records/SmallFile.h"
+#include "host/system/files/AtomicWrite.h"
+
+#include <fcntl.h>
+
+#include <cerrno>
+
+namespace host::drive {
+
+using host::system::FileDescriptor;
+
+platform::Result<PromiseRecord> readPromise(const DriveEntry& entry)
+{
+    const auto text = host::system::readWholeFile(
+        entry.folder, entry.promiseName(), PromiseRecord::maximumFileSize, entry.path);
+    if (!text)
+        return *text.error;
+    auto promise = PromiseRecord::parse(*text);
+    return promise ? platform::Result<PromiseRecord>(std::move(*promise))
+                   : damagedRecord(entry.path, "its promise is no JSON object");
+}
+
+int contentOfPromise(const FileDescriptor& folder, const std::string& promiseName, std::string& content)
+{
+    const auto text =
+        host::system::readWholeFile(folder, promiseName, PromiseRecord::maximumFileSize, promiseName);
+    const auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
+    content = promise ? promise->content : std::string();
+    // What is too large is damaged; nothing else that the system says means that nothing lies behind it.
+    const bool hasFailed =
+        text.error && text.error->domain() == platform::errorDomain::system && text.error->code() != EFBIG;
+    return hasFailed ? text.error->code() : 0;
+}
+
+void dropRedundantPromise(const DriveEntry& entry, CloudStore& store)
+{
+    struct stat found;
+    if (entry.status(found) != 0)
+        return;
+    const auto promise = readPromise(entry);
+    if (!promise)
+        return;
+    const FileDescriptor document(::openat(
+        entry.folder.get(), entry.name.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
+    const auto& content = promise->content;
+    if (!content.empty() && store.holdsOtherThan(content, document))
+        return;
+    // The content first: a promise with nothing behind it is found again, a content without a promise is not.
+    if (content.empty() || store.remove(content) == 0)
+        ::unlinkat(entry.folder.get(), entry.promiseName().c_str(), 0);
+}
+
+} // namespace host::drive

@@ -1,0 +1,183 @@
+#include "host/drive/changes/Recovery.h"
+
+#include "host/drive/changes/Discarding.h"
+#include "host/drive/changes/HeldItem.h"
+#include "host/drive/changes/PromiseFile.h"
+#include "host/drive/changes/TreeCopy.h"
+#include "host/drive/changes/TreeWalk.h"
+#include "host/drive/records/BeneathRoot.h"
+#include "host/drive/records/SmallFile.h"
+#include "host/system/files/DirectoryReader.h"
+#include "platform/Log.h"
+
+#include <fcntl.h>
+#include <sys/xattr.h>
+
+#include <cerrno>
+
+namespace host::drive {
+
+using host::system::FileDescriptor;
+
+namespace {
+
+/// Where an item of the trash came from.
+constexpr const char* originMark = "user.tarrow.origin";
+
+bool isThere(const DriveEntry& entry)
+{
+    struct stat found;
+    return entry.status(found) == 0;
+}
+
+std::string lastName(const std::string& path)
+{
+    return path.substr(path.rfind('/') + 1);
+}
+
+/// The same private name with another prefix.
+DriveEntry renamed(const DriveEntry& entry, const char* prefix)
+{
+    return {FileDescriptor(::fcntl(entry.folder.get(), F_DUPFD_CLOEXEC, 0)),
+        prefix + entry.name.substr(entry.name.find('-') + 1), entry.path};
+}
+
+/// The document that a promise's name stands for; another name stands for itself.
+std::string documentPath(const std::string& path)
+{
+    return PromiseRecord::itemPathFor(path).value_or(path);
+}
+
+} // namespace
+
+void Recovery::run()
+{
+    WorkRecord::forEachAbandoned(
+        _layout, [this](const WorkRecord::Places& places) { return settle(places); });
+    settleStrays();
+}
+
+platform::Result<DriveEntry> Recovery::entryAt(const std::string& path) const
+{
+    const auto name = lastName(path);
+    if (path != _layout.held() + '/' + name)
+        return DriveEntry::open(_layout, path);
+    auto folder = openOwnFolder(_layout.held());
+    return folder ? platform::Result<DriveEntry>(DriveEntry{std::move(folder), name, path})
+                  : itemError(errno, path);
+}
+
+bool Recovery::settle(const WorkRecord::Places& places)
+{
+    return lastName(places.working).starts_with(WorkRecord::temporaryPrefix) ? settleCopy(places)
+                                                                             : settleHeld(places);
+}
+
+bool Recovery::settleCopy(const WorkRecord::Places& places)
+{
+    static constexpr platform::Operation op{"-[Recovery settleCopy:]"};
+    const auto temporary = DriveEntry::open(_layout, places.working);
+    int failure = temporary ? removeTree(temporary->folder, temporary->name) : ENOENT;
+    if ((failure == 0 || failure == ENOENT) && !places.copy.empty())
+        failure = finishMove(places);
+    const auto document = DriveEntry::open(_layout, documentPath(places.item));
+    if (document)
+        dropRedundantPromise(*document, _store);
+    if (failure == 0 || failure == ENOENT)
+        return true;
+    op.warning("Cannot settle what was left of %@: %@", places.item, itemError(failure, places.item));
+    return false;
+}
+
+int Recovery::finishMove(const WorkRecord::Places& places)
+{
+    const auto item = DriveEntry::open(_layout, places.item), copy = DriveEntry::open(_layout, places.copy);
+    if (!item || !copy || !isSameTree(item->folder, item->name, copy->folder, copy->name))
+        return 0;
+    std::optional<HeldItem> held;
+    if (const int failure = HeldItem::take(_layout, *item, item->name, held, places.copy); failure != 0)
+        return failure;
+    // What changed between the two looks comes back.
+    return isSameTree(held->folder(), held->name(), copy->folder, copy->name) ? held->remove(nullptr) : 0;
+}
+
+bool Recovery::settleHeld(const WorkRecord::Places& places)
+{
+    const auto held = entryAt(places.working);
+    if (!held)
+        return true; // its folder is gone, and it with it
+    const auto gone = renamed(*held, WorkRecord::gonePrefix), moved = renamed(*held, WorkRecord::movedPrefix);
+    if (isThere(gone))
+        return discard(gone, true);
+    if (isThere(moved))
+        return discard(moved, false);
+    if (!isThere(*held))
+        return true;
+    const auto copy = DriveEntry::open(_layout, places.copy);
+    if (copy && isSameTree(held->folder, held->name, copy->folder, copy->name))
+        return discard(*held, false);
+    return putBack(*held, places.item);
+}
+
+bool Recovery::discard(const DriveEntry& entry, bool contentsToo)
+{
+    static constexpr platform::Operation op{"-[Recovery discard:]"};
+    int failure = 0;
+    discardTree(entry.folder, entry.name, contentsToo ? &_store : nullptr, failure);
+    if (failure != 0)
+        op.warning("Cannot remove the rest of %@: %@", entry.path, itemError(failure, entry.path));
+    return failure == 0;
+}
+
+bool Recovery::putBack(const DriveEntry& held, const std::string& item)
+{
+    const auto origin = DriveEntry::open(_layout, item);
+    const int failure = origin ? renameEntry(held.folder, held.name, origin->folder, origin->name) : ENOENT;
+    if (failure == 0)
+        return syncFolder(origin->folder) == 0;
+    return (failure == EEXIST || failure == ENOENT) && moveToTrash(held, item);
+}
+
+bool Recovery::moveToTrash(const DriveEntry& held, const std::string& item)
+{
+    static constexpr platform::Operation op{"-[Recovery moveToTrash:]"};
+    constexpr int mostOfOneName = 1000;
+    const auto trash = openOwnFolder(_layout.trash());
+    const auto path = descriptorPath(held.folder) + '/' + held.name;
+    ::lsetxattr(path.c_str(), originMark, item.data(), item.size(), 0);
+    const auto document = PromiseRecord::itemPathFor(lastName(item));
+    int failure = trash ? EEXIST : errno;
+    for (int number = 1; failure == EEXIST && number < mostOfOneName; ++number) {
+        auto name = document.value_or(lastName(item));
+        if (number > 1)
+            name += ' ' + std::to_string(number);
+        failure = renameEntry(held.folder, held.name, trash, document ? PromiseRecord::pathFor(name) : name);
+    }
+    if (failure == 0)
+        op.warning("Cannot put back %@: it is in the trash now", item);
+    else
+        op.error("Cannot put back %@, kept as %@: %@", item, held.path, itemError(failure, item));
+    return failure == 0;
+}
+
+void Recovery::settleStrays()
+{
+    const auto folder = system::openFolder(_layout.held());
+    std::vector<std::string> names;
+    if (!folder || readNames(folder, names) != 0)
+        return;
+    for (const auto& name : names) {
+        // On a full disk an item may be held without a record.
+        const auto held = entryAt(_layout.held() + '/' + name);
+        if (!held || WorkRecord::isRecorded(_layout, name) || !isProcessGone(name))
+            continue;
+        if (name.starts_with(WorkRecord::heldPrefix))
+            moveToTrash(*held, "Recovered " + name.substr(name.find('-') + 1));
+        else if (name.starts_with(WorkRecord::gonePrefix))
+            discard(*held, true);
+        else if (name.starts_with(WorkRecord::movedPrefix))
+            discard(*held, false);
+    }
+}
+
+} // namespace host::drive

@@ -1,0 +1,112 @@
+#include "host/drive/changes/WorkRecord.h"
+
+#include "host/drive/changes/DriveEntry.h"
+#include "host/drive/records/SmallFile.h"
+#include "host/system/files/DirectoryReader.h"
+
+#include <fcntl.h>
+
+#include <cerrno>
+#include <memory>
+
+namespace host::drive {
+
+using host::system::FileDescriptor;
+
+namespace {
+
+constexpr std::string_view recordSuffix = ".place";
+constexpr std::size_t largestRecord = 16 * 1024; // three paths
+
+bool lockWhole(const FileDescriptor& file, int command)
+{
+    struct flock lock { };
+    lock.l_type = F_WRLCK;
+    lock.l_whence = SEEK_SET;
+    return ::fcntl(file.get(), command, &lock) == 0;
+}
+
+std::string textOf(const WorkRecord::Places& places)
+{
+    // The last NUL tells that the text is whole.
+    return places.item + '\0' + places.working + '\0' + places.copy + '\0';
+}
+
+/// Empty places for a record that was not written whole: nothing had been done by it then.
+WorkRecord::Places placesOf(const std::string& text)
+{
+    const auto first = text.find('\0'), second = text.find('\0', first + 1);
+    if (first == std::string::npos || second == std::string::npos || !text.ends_with('\0')
+        || second + 1 == text.size())
+        return {};
+    return {text.substr(0, first), text.substr(first + 1, second - first - 1),
+        text.substr(second + 1, text.size() - second - 2)};
+}
+
+std::string lastName(const std::string& path)
+{
+    return path.substr(path.rfind('/') + 1);
+}
+
+} // namespace
+
+WorkRecord::WorkRecord(WorkRecord&& other) noexcept
+    : _file(std::move(other._file))
+    , _path(std::exchange(other._path, {}))
+{
+}
+
+WorkRecord::~WorkRecord()
+{
+    if (!_path.empty())
+        ::unlink(_path.c_str());
+}
+
+int WorkRecord::write(const DriveLayout& layout, const Places& places, std::optional<WorkRecord>& record)
+{
+    if (!openOwnFolder(layout.held()))
+        return errno;
+    const auto isFull = [] { return errno == ENOSPC || errno == EDQUOT; };
+    const auto text = textOf(places);
+    WorkRecord fresh;
+    fresh._path = layout.held() + '/' + lastName(places.working) + std::string(recordSuffix);
+    fresh._file = FileDescriptor(::open(fresh._path.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0600));
+    if (!fresh._file && !isFull())
+        return errno;
+    if (fresh._file && !lockWhole(fresh._file, F_OFD_SETLKW))
+        return errno;
+    if (fresh._file && ::write(fresh._file.get(), text.data(), text.size()) < 0 && !isFull())
+        return errno;
+    record.emplace(std::move(fresh));
+    return 0;
+}
+
+bool WorkRecord::isRecorded(const DriveLayout& layout, const std::string& name)
+{
+    struct stat found;
+    return name.ends_with(recordSuffix)
+        || ::lstat((layout.held() + '/' + name + std::string(recordSuffix)).c_str(), &found) == 0;
+}
+
+void WorkRecord::forEachAbandoned(const DriveLayout& layout, const std::function<bool(const Places&)>& settle)
+{
+    const auto folder = system::openFolder(layout.held());
+    if (!folder)
+        return;
+    const auto reader = std::make_unique<system::DirectoryReader>(folder);
+    while (const auto entry = reader->next()) {
+        if (!entry->name.ends_with(recordSuffix))
+            continue;
+        const auto path = layout.held() + '/' + std::string(entry->name);
+        const FileDescriptor file(::open(path.c_str(), O_RDWR | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC));
+        if (!file || !lockWhole(file, F_OFD_SETLK))
+            continue; // its process still works
+        // One without its text may be a living process's that has not locked it yet.
+        const auto text = readSmallFile(file, path, largestRecord);
+        const auto places = text ? placesOf(*text) : Places{};
+        if (places.working.empty() ? isProcessGone(std::string(entry->name)) : settle(places))
+            ::unlink(path.c_str());
+    }
+}
+
+} // namespace host::drive

@@ -1,0 +1,154 @@
+#include "host/drive/identity/DocumentSearch.h"
+
+#include "host/drive/changes/WorkRecord.h"
+#include "host/drive/identity/IdentifiedItem.h"
+#include "host/drive/records/ItemFacts.h"
+#include "host/drive/records/PromiseRecord.h"
+#include "host/drive/records/SmallFile.h"
+#include "host/system/files/DeepEnumeration.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+
+#include <algorithm>
+#include <array>
+#include <map>
+
+namespace host::drive {
+
+using host::system::DeepEnumeration;
+using platform::FileType;
+using platform::Url;
+using Continue = platform::FileSystem::Continue;
+
+namespace {
+
+/// An item that was met, and what tells which of two is the older.
+struct Candidate {
+    DocumentPlace place;
+    std::int64_t born = 0; ///< nanoseconds since 1970; 0 where nobody knows
+};
+
+bool mayCarry(FileType type)
+{
+    return type == FileType::Regular || type == FileType::Directory;
+}
+
+/// Whether something is at a path for the time of an operation only: a copy that is not whole, or what is
+/// being removed.
+bool isInWork(const std::string& path)
+{
+    constexpr std::array prefixes{
+        WorkRecord::heldPrefix, WorkRecord::gonePrefix, WorkRecord::movedPrefix, WorkRecord::temporaryPrefix};
+    return std::ranges::any_of(
+        prefixes, [&](const char* prefix) { return path.find('/' + std::string(prefix)) != path.npos; });
+}
+
+std::int64_t birthOfPromise(const std::string& path)
+{
+    const auto text = readSmallFile(path, PromiseRecord::maximumFileSize);
+    const auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
+    return promise && promise->created ? promise->created->nanoseconds : 0;
+}
+
+std::optional<Candidate> candidateAt(const std::string& path, const std::string& home)
+{
+    struct stat status;
+    struct statx birth;
+    constexpr int flags = AT_SYMLINK_NOFOLLOW | AT_STATX_DONT_SYNC;
+    if (::lstat(path.c_str(), &status) != 0
+        || ::statx(AT_FDCWD, path.c_str(), flags, STATX_BTIME, &birth) != 0)
+        return std::nullopt;
+    const auto promised = PromiseRecord::itemPathFor(path);
+    // An item counts before its promise.
+    if (isInWork(path) || (promised && existsOnDisk(*promised) != false))
+        return std::nullopt;
+    const bool isBorn = (birth.stx_mask & STATX_BTIME) != 0;
+    const auto born = promised ? birthOfPromise(path)
+        : isBorn               ? birth.stx_btime.tv_sec * 1'000'000'000 + birth.stx_btime.tv_nsec
+                               : 0;
+    return Candidate{{promised.value_or(path).substr(home.size() + 1), status.st_dev, status.st_ino}, born};
+}
+
+/// Of one age, the first by its path: every search answers the same.
+bool isOlder(const Candidate& a, const Candidate& b)
+{
+    return a.born != b.born ? a.born < b.born : a.place.path < b.place.path;
+}
+
+bool isOfInode(const DocumentPlace& place, const DocumentPlace& known)
+{
+    return known.inode != 0 && place.inode == known.inode;
+}
+
+Continue goOn(const Url&, const platform::Error&)
+{
+    return Continue::Yes; // a folder that cannot be read does not hide the others
+}
+
+} // namespace
+
+DocumentSearch::Finding DocumentSearch::find(
+    const std::string& folder, Depth depth, const IdentifiedPlace& known, Effort effort) const
+{
+    std::optional<Candidate> best;
+    Finding finding;
+    std::size_t left = static_cast<std::size_t>(effort);
+    const auto entry = [&](const Url& url, FileType type) {
+        const auto& path = url.path();
+        if (depth == Depth::Folder && path.find('/', folder.size() + 1) != std::string::npos)
+            return Continue::No; // the folder's own names come first
+        finding.isExhaustive = left > 0;
+        if (left-- == 0)
+            return Continue::No;
+        if (!mayCarry(type) || identifierAt(path) != known.identifier)
+            return Continue::Yes;
+        const auto candidate = candidateAt(path, _layout.home());
+        if (candidate && (!best || isOfInode(candidate->place, known.place) || isOlder(*candidate, *best)))
+            best = candidate;
+        return best && isOfInode(best->place, known.place) ? Continue::No : Continue::Yes;
+    };
+    const DeepEnumeration::ErrorHandler error = goOn;
+    const DeepEnumeration::EntryHandler handler = entry;
+    DeepEnumeration(Url::fileURL(folder), handler, error).run();
+    if (best)
+        finding.place = best->place;
+    return finding;
+}
+
+DocumentSearch::Finding DocumentSearch::findInFolderOf(const IdentifiedPlace& known, Effort effort) const
+{
+    const auto path = _layout.home() + '/' + known.place.path;
+    const auto folder = path.substr(0, path.find_last_of('/'));
+    if (folder != _layout.documents() && !folder.starts_with(_layout.documents() + '/'))
+        return {};
+    return find(folder, Depth::Folder, known, effort);
+}
+
+DocumentSearch::Finding DocumentSearch::findInDrive(const IdentifiedPlace& known, Effort effort) const
+{
+    return find(_layout.documents(), Depth::Everything, known, effort);
+}
+
+std::vector<IdentifiedPlace> DocumentSearch::findAll() const
+{
+    std::map<std::uint32_t, Candidate> found;
+    const DeepEnumeration::EntryHandler entry = [&](const Url& url, FileType type) {
+        const auto identifier = mayCarry(type) ? identifierAt(url.path()) : std::uint32_t{0};
+        const auto candidate = identifier != 0 ? candidateAt(url.path(), _layout.home()) : std::nullopt;
+        if (!candidate)
+            return Continue::Yes;
+        const auto [at, isNew] = found.try_emplace(identifier, *candidate);
+        if (!isNew && isOlder(*candidate, at->second))
+            at->second = *candidate;
+        return Continue::Yes;
+    };
+    const DeepEnumeration::ErrorHandler error = goOn;
+    DeepEnumeration(Url::fileURL(_layout.documents()), entry, error).run();
+    std::vector<IdentifiedPlace> all;
+    for (auto& [identifier, candidate] : found)
+        all.push_back({identifier, std::move(candidate.place)});
+    return all;
+}
+
+} // namespace host::drive

@@ -1,0 +1,108 @@
+#include "host/drive/changes/DriveEntry.h"
+#include "host/drive/identity/IdentifiedItem.h"
+#include "host/drive/identity/LocalDocumentIdentifiers.h"
+#include "host/drive/records/PromiseRecord.h"
+#include "host/drive/records/RealPath.h"
+#include "host/drive/records/SmallFile.h"
+
+#include <fcntl.h>
+#include <sys/file.h>
+
+#include <cerrno>
+
+namespace host::drive {
+
+using host::system::FileDescriptor;
+using platform::Result;
+using platform::Url;
+using Kind = DocumentIndex::Answer::Kind;
+
+namespace {
+
+/// One at a time among all threads and processes, until it is closed. Where even the lock cannot be made,
+/// nothing can be written to the index either.
+FileDescriptor lockGiving(const DriveLayout& layout)
+{
+    openOwnFolder(layout.locks());
+    FileDescriptor file(
+        ::open(layout.identification().c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600));
+    int result = 0;
+    do
+        result = file ? ::flock(file.get(), LOCK_EX) : 0;
+    while (result != 0 && errno == EINTR);
+    return file;
+}
+
+} // namespace
+
+Result<std::uint32_t> LocalDocumentIdentifiers::identify(const Url& url)
+{
+    const auto real = url.isFileURL() ? realPathOfEntry(url.path()) : std::nullopt;
+    const auto path = relativePath(real ? PromiseRecord::itemPathFor(*real).value_or(*real) : "");
+    if (!path)
+        return itemError(EXDEV, url.path());
+    return identifyAt(*path);
+}
+
+Result<std::uint32_t> LocalDocumentIdentifiers::identifyAt(const std::string& path)
+{
+    const auto lock = lockGiving(_layout);
+    const auto item = IdentifiedItem::open(_layout, path);
+    const int failure = item ? 0 : item.error->code();
+    if (failure != 0 && failure != ELOOP)
+        return itemError(failure, path);
+    if (failure == ELOOP || !item->canCarryIdentifier())
+        return platform::Error(platform::FileErrorCode::Unsupported);
+    // Whether another item has the identifier can be told only by an index that knows them all.
+    if (_index.prepareForWriting() == DocumentIndex::State::Incomplete)
+        rebuild();
+    if (_index.prepareForWriting() != DocumentIndex::State::Complete)
+        return itemError(EAGAIN, path);
+    const auto identifier = item->identifier();
+    const auto answer = _index.lookUp(identifier, IndexDatabase::Use::Writing);
+    if (answer.kind == Kind::Unreadable)
+        return itemError(EAGAIN, path);
+    if (identifier != 0 && isOwner({identifier, answer.place}, answer.kind, item->place()))
+        return identifier;
+    return giveIdentifier(*item);
+}
+
+bool LocalDocumentIdentifiers::isOwner(
+    const IdentifiedPlace& known, DocumentIndex::Answer::Kind kind, const DocumentPlace& place)
+{
+    if (kind == Kind::Removed)
+        return false;
+    if (kind == Kind::Known && known.place == place)
+        return true;
+    if (kind == Kind::Known && known.place.inode != place.inode) {
+        // The document that has it may have been moved or saved anew by others. This item has it only when
+        // no other can be found.
+        const auto owner = locate(known, Effort::Whole);
+        if (owner && owner->inode != place.inode) {
+            _index.note(known.identifier, *owner);
+            return false;
+        }
+    }
+    _index.note(known.identifier, place);
+    return true;
+}
+
+Result<std::uint32_t> LocalDocumentIdentifiers::giveIdentifier(const IdentifiedItem& item)
+{
+    const auto place = item.place();
+    // First the index, then the item: a crash in between leaves a number that nobody has.
+    const auto identifier = _index.reserve(place);
+    if (!identifier)
+        return itemError(EAGAIN, place.path);
+    if (const int failure = item.carry(*identifier); failure != 0) {
+        _index.release(*identifier);
+        return itemError(failure, place.path);
+    }
+    // The promise that carries it is a new file.
+    const auto now = IdentifiedItem::open(_layout, place.path);
+    if (now && now->place() != place && now->identifier() == *identifier)
+        _index.note(*identifier, now->place());
+    return *identifier;
+}
+
+} // namespace host::drive

@@ -1,0 +1,269 @@
+#include "host/drive/identity/LocalDocumentIdentifiers.h"
+
+#include "host/drive/identity/IdentifiedItem.h"
+#include "host/drive/records/AccountRecord.h"
+#include "host/drive/records/LinkRecords.h"
+#include "host/drive/records/PromiseRecord.h"
+
+#include <cerrno>
+
+namespace host::drive {
+
+using platform::Error;
+using platform::Result;
+using platform::Url;
+using Kind = DocumentIndex::Answer::Kind;
+
+namespace {
+
+// What is remembered between two looks at the index; beyond it the memory begins anew.
+constexpr std::size_t mostRemembered = 4096;
+
+Error failed(int errorNumber)
+{
+    return {platform::errorDomain::system, errorNumber};
+}
+
+/// What is on disk for an item: itself, else its promise. Answers the path, or nothing.
+std::optional<std::string> physicalPath(const std::string& path, struct stat& status)
+{
+    if (::lstat(path.c_str(), &status) == 0)
+        return path;
+    auto promise = PromiseRecord::pathFor(path);
+    return errno == ENOENT && ::lstat(promise.c_str(), &status) == 0 ? std::optional(std::move(promise))
+                                                                     : std::nullopt;
+}
+
+} // namespace
+
+std::shared_ptr<LocalDocumentIdentifiers> LocalDocumentIdentifiers::create(
+    const DriveLayout& layout, const std::shared_ptr<platform::Dispatch>& dispatch)
+{
+    return std::shared_ptr<LocalDocumentIdentifiers>(new LocalDocumentIdentifiers(layout, dispatch));
+}
+
+LocalDocumentIdentifiers::LocalDocumentIdentifiers(
+    const DriveLayout& layout, const std::shared_ptr<platform::Dispatch>& dispatch)
+    : _layout(layout)
+    , _index(layout.index())
+    , _search(layout)
+    , _dispatch(dispatch)
+    , _queue(dispatch->makeSerialQueue("TarrowDriveAppID.identifiers"))
+{
+}
+
+std::optional<std::uint64_t> LocalDocumentIdentifiers::deviceIdentifier()
+{
+    const std::lock_guard lock(_mutex);
+    struct stat status;
+    if (!_device && AccountRecord::read(_layout) && ::stat(_layout.defaultContainer().c_str(), &status) == 0)
+        _device = status.st_dev;
+    return _device;
+}
+
+Result<platform::DocumentIdentifiers::File> LocalDocumentIdentifiers::resolve(std::uint32_t identifier)
+{
+    return resolve(identifier, _dispatch->isMainThread() ? Effort::Unnoticed : Effort::Whole);
+}
+
+Result<platform::DocumentIdentifiers::File> LocalDocumentIdentifiers::resolve(
+    std::uint32_t identifier, Effort effort)
+{
+    if (identifier == 0)
+        return failed(ENOENT);
+    auto answer = _index.lookUp(identifier);
+    if (answer.kind == Kind::Removed)
+        return failed(ENOENT);
+    const IdentifiedPlace known{identifier, std::move(answer.place)};
+    if (answer.kind == Kind::Known && isAt(known))
+        return File{known.place.inode, known.place.path};
+    const auto place = locate(known, effort);
+    // What does not know everything must be made anew, or every look would be a search.
+    const bool isIncomplete = answer.kind != Kind::Known && _index.state() != DocumentIndex::State::Complete;
+    if (isIncomplete || (!place && effort == Effort::Unnoticed))
+        searchInBackground(known);
+    if (!place)
+        return failed(ENOENT);
+    if (answer.kind != Kind::Unreadable)
+        _index.note(identifier, *place);
+    return File{place->inode, place->path};
+}
+
+Result<std::shared_ptr<const platform::DocumentIdentifiers::OpenFile>> LocalDocumentIdentifiers::open(
+    const File& file)
+{
+    if (!isPlainRelativePath(file.place))
+        return failed(ENOENT);
+    auto item = IdentifiedItem::open(_layout, file.place);
+    if (!item) {
+        // A link may lead to where the document went; then only a search finds its own place.
+        for (const auto& known : _index.documentsWithin(file.place))
+            searchInBackground(known);
+        return *item.error;
+    }
+    if (item->inode() != file.number)
+        return failed(ESTALE);
+    return std::shared_ptr<const OpenFile>(std::make_shared<IdentifiedItem>(std::move(*item.value)));
+}
+
+std::optional<Url> LocalDocumentIdentifiers::find(std::uint32_t identifier)
+{
+    const auto file = resolve(identifier, Effort::Whole);
+    const auto item = file ? open(*file) : Result<std::shared_ptr<const OpenFile>>();
+    const auto attributes = item ? (*item)->attributes() : Result<OpenFile::Attributes>();
+    if (!attributes || attributes->documentIdentifier != identifier)
+        return std::nullopt;
+    return attributes->url;
+}
+
+bool LocalDocumentIdentifiers::isAt(const IdentifiedPlace& known) const
+{
+    struct stat status;
+    if (known.place.inode == 0 || !isPlainRelativePath(known.place.path))
+        return false;
+    const auto path = physicalPath(_layout.home() + '/' + known.place.path, status);
+    if (!path || status.st_ino != known.place.inode)
+        return false;
+    // Another number of the volume may be another volume, where the same inode is another file.
+    return status.st_dev == known.place.device || identifierAt(*path) == known.identifier;
+}
+
+std::optional<DocumentPlace> LocalDocumentIdentifiers::locate(const IdentifiedPlace& known, Effort effort)
+{
+    std::optional<DocumentPlace> best;
+    if (isPlainRelativePath(known.place.path)) {
+        // It may have been saved by replacing it. It may also be a copy where the document was before.
+        const auto item = IdentifiedItem::open(_layout, known.place.path);
+        if (item && item->identifier() == known.identifier && item->attributes())
+            best = item->place();
+        if (best && known.place.inode == 0)
+            return best;
+        const auto inFolder = _search.findInFolderOf(known, effort).place;
+        if (inFolder && (inFolder->inode == known.place.inode || known.place.inode == 0))
+            return inFolder;
+        best = best ? best : inFolder;
+    }
+    const auto inDrive = _search.findInDrive(known, effort).place;
+    if (inDrive && (!best || inDrive->inode == known.place.inode))
+        return inDrive;
+    return best;
+}
+
+void LocalDocumentIdentifiers::searchInBackground(const IdentifiedPlace& known)
+{
+    {
+        const std::lock_guard lock(_mutex);
+        if (_searched.size() >= mostRemembered)
+            _searched.clear();
+        if (!_searched.insert(known.identifier).second)
+            return;
+    }
+    _queue->async([weak = weak_from_this(), known] {
+        const auto self = weak.lock();
+        if (!self)
+            return;
+        if (self->_index.state() != DocumentIndex::State::Complete)
+            self->rebuild();
+        else if (const auto place = self->locate(known, Effort::Whole))
+            self->_index.note(known.identifier, *place);
+    });
+}
+
+void LocalDocumentIdentifiers::rebuild()
+{
+    if (_index.state() == DocumentIndex::State::Unavailable)
+        return;
+    auto all = _search.findAll();
+    // What the index knows and what is there counts before what is older: a copy may have an older date.
+    std::erase_if(all, [this](const auto& found) {
+        const auto answer = _index.lookUp(found.identifier);
+        return answer.kind == Kind::Known && isAt({found.identifier, answer.place});
+    });
+    _index.complete(all);
+}
+
+std::optional<std::string> LocalDocumentIdentifiers::relativePath(const std::string& path) const
+{
+    if (!path.starts_with(_layout.documents() + '/'))
+        return std::nullopt;
+    auto relative = path.substr(_layout.home().size() + 1);
+    return isPlainRelativePath(relative) ? std::optional(std::move(relative)) : std::nullopt;
+}
+
+void LocalDocumentIdentifiers::seen(std::uint32_t identifier, const std::string& path)
+{
+    {
+        const std::lock_guard lock(_mutex);
+        if (_seen.size() >= mostRemembered)
+            _seen.clear();
+        auto& known = _seen[identifier];
+        if (known == path)
+            return;
+        known = path;
+        _searched.erase(identifier);
+    }
+    _queue->async([weak = weak_from_this(), identifier, path] {
+        if (const auto self = weak.lock())
+            self->correct(identifier, path);
+    });
+}
+
+void LocalDocumentIdentifiers::correct(std::uint32_t identifier, const std::string& path)
+{
+    const auto relative = relativePath(path);
+    const auto item = relative ? IdentifiedItem::open(_layout, *relative) : Result<IdentifiedItem>();
+    if (!item || item->identifier() != identifier)
+        return;
+    const auto answer = _index.lookUp(identifier);
+    if (answer.kind == Kind::Removed || (answer.kind == Kind::Known && answer.place == item->place()))
+        return;
+    const IdentifiedPlace known{identifier, answer.place};
+    if (_index.state() != DocumentIndex::State::Complete)
+        rebuild();
+    else if (answer.kind == Kind::Unknown || answer.place.inode == item->inode())
+        _index.note(identifier, item->place());
+    else if (const auto place = isAt(known) ? std::nullopt : locate(known, Effort::Whole))
+        _index.note(identifier, *place);
+}
+
+void LocalDocumentIdentifiers::moved(const std::string& from, const std::string& to)
+{
+    const auto source = relativePath(from), target = relativePath(to);
+    if (!source || !target)
+        return;
+    _index.noteMove(*source, *target);
+    const auto item = IdentifiedItem::open(_layout, *target);
+    const auto identifier = item ? item->identifier() : 0;
+    const auto answer = identifier != 0 ? _index.lookUp(identifier) : DocumentIndex::Answer();
+    // A move to another file system makes another file of it.
+    if (answer.kind == Kind::Known && answer.place.path == *target && answer.place != item->place())
+        _index.note(identifier, item->place());
+}
+
+void LocalDocumentIdentifiers::replaced(const std::string& path)
+{
+    _queue->async([weak = weak_from_this(), path] {
+        if (const auto self = weak.lock())
+            self->moved(path, path);
+    });
+}
+
+std::vector<std::uint32_t> LocalDocumentIdentifiers::documentsWithin(const std::string& path) const
+{
+    std::vector<std::uint32_t> identifiers;
+    const auto relative = relativePath(path);
+    for (const auto& known : relative ? _index.documentsWithin(*relative) : std::vector<IdentifiedPlace>()) {
+        // One that others moved away is not removed with the folder where it was.
+        if (isAt(known))
+            identifiers.push_back(known.identifier);
+    }
+    return identifiers;
+}
+
+void LocalDocumentIdentifiers::removed(const std::vector<std::uint32_t>& identifiers)
+{
+    for (const auto identifier : identifiers)
+        _index.noteRemoval(identifier);
+}
+
+} // namespace host::drive

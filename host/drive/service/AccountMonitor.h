@@ -1,0 +1,47 @@
+#pragma once
+
+#include "host/drive/records/DriveDependencies.h"
+#include "host/drive/records/DriveLayout.h"
+#include "host/drive/records/FollowedFolder.h"
+#include "platform/Dispatch.h"
+#include "platform/NotificationCenter.h"
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace host::drive {
+
+/// Watches the account's file and posts Notification::CloudIdentityDidChange when another account (or none)
+/// is signed in. A file that is merely written again with the same identity is no change. Main thread; the
+/// file is read on a queue of its own.
+class AccountMonitor : public std::enable_shared_from_this<AccountMonitor> {
+public:
+    static std::shared_ptr<AccountMonitor> start(
+        const DriveLayout& layout, const DriveDependencies& dependencies);
+
+    /// Called on the main thread after each change of the file, whatever changed in it.
+    void onFileChanged(std::function<void()> handler) { _fileChanged = std::move(handler); }
+
+    /// Reads the file and compares, as if it had changed.
+    void check();
+
+private:
+    AccountMonitor(const DriveLayout& layout, const DriveDependencies& dependencies);
+
+    void begin();
+    void identityRead(std::optional<std::string> identity);
+
+    DriveLayout _layout;
+    std::shared_ptr<platform::Dispatch> _dispatch;
+    std::shared_ptr<platform::NotificationCenter> _notifications;
+    std::shared_ptr<platform::Queue> _queue;
+    std::shared_ptr<FollowedFolder> _folder;
+    std::function<void()> _fileChanged;
+    std::optional<std::string> _identity;
+    bool _checkIsWaiting = false;
+    bool _checkAgain = false; ///< something changed while a check waited
+};
+
+} // namespace host::drive

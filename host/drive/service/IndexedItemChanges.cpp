@@ -1,0 +1,45 @@
+#include "host/drive/service/IndexedItemChanges.h"
+
+namespace host::drive {
+
+using platform::Error;
+using platform::ItemVersion;
+
+std::optional<Error> IndexedItemChanges::removeItem(
+    const std::string& path, const std::optional<ItemVersion>& unchangedSince)
+{
+    const auto documents = _identifiers->documentsWithin(path);
+    auto error = LocalItemChanges::removeItem(path, unchangedSince);
+    if (!error)
+        _identifiers->removed(documents);
+    return error;
+}
+
+std::optional<Error> IndexedItemChanges::moveItem(const std::string& from, const std::string& to)
+{
+    auto error = LocalItemChanges::moveItem(from, to);
+    if (!error)
+        _identifiers->moved(from, to);
+    return error;
+}
+
+platform::Result<ItemVersion> IndexedItemChanges::replaceContent(
+    const std::string& path, const platform::FileContent& before, std::string_view content)
+{
+    auto replaced = LocalItemChanges::replaceContent(path, before, content);
+    // Another file carries the identifier now.
+    if (replaced)
+        _identifiers->moved(path, path);
+    return replaced;
+}
+
+std::optional<Error> IndexedItemChanges::evictItem(const std::string& path)
+{
+    auto error = LocalItemChanges::evictItem(path);
+    // The item is where it was, but it is its promise that carries the identifier now.
+    if (!error)
+        _identifiers->moved(path, path);
+    return error;
+}
+
+} // namespace host::drive

@@ -1,0 +1,29 @@
+#pragma once
+
+#include "host/drive/changes/LocalItemChanges.h"
+#include "host/drive/identity/LocalDocumentIdentifiers.h"
+
+namespace host::drive {
+
+/// Changes of the drive's items that the document index hears of.
+class IndexedItemChanges : public LocalItemChanges {
+public:
+    IndexedItemChanges(const DriveLayout& layout, std::shared_ptr<CloudStore> store,
+        std::shared_ptr<LocalDocumentIdentifiers> identifiers)
+        : LocalItemChanges(layout, std::move(store))
+        , _identifiers(std::move(identifiers))
+    {
+    }
+
+    std::optional<platform::Error> removeItem(
+        const std::string& path, const std::optional<platform::ItemVersion>& unchangedSince) override;
+    std::optional<platform::Error> moveItem(const std::string& from, const std::string& to) override;
+    platform::Result<platform::ItemVersion> replaceContent(
+        const std::string& path, const platform::FileContent& before, std::string_view content) override;
+    std::optional<platform::Error> evictItem(const std::string& path) override;
+
+private:
+    std::shared_ptr<LocalDocumentIdentifiers> _identifiers;
+};
+
+} // namespace host::drive

@@ -1,0 +1,51 @@
+#pragma once
+
+#include "host/drive/records/ItemFacts.h"
+#include "host/system/files/DriveNames.h"
+#include "platform/DocumentContainers.h"
+#include "platform/Localization.h"
+#include "platform/TypeRegistry.h"
+
+#include <memory>
+
+namespace host::drive {
+
+/// Turns what was found of an item into the values of its attributes.
+class ItemAttributes {
+public:
+    /// Extension of alias files; their kind is called "Alias" in every language.
+    static constexpr std::string_view aliasExtension = system::aliasExtension;
+    static constexpr std::string_view aliasType = system::aliasType;
+
+    /// `localization` may be null: then no name is translated.
+    ItemAttributes(std::shared_ptr<const platform::TypeRegistry> types,
+        std::shared_ptr<const platform::DocumentContainers> containers,
+        std::shared_ptr<const platform::Localization> localization, platform::Url defaultContainer);
+
+    /// Puts the values of the keys into a map, for an item that is here or promised. A key that the item has
+    /// no value for is left out; so is the thumbnail map.
+    void fill(platform::AttributeMap& map, const platform::Url& url, const ItemFacts& facts,
+        platform::AttributeKeys keys) const;
+
+    /// Whether a picture is here, judged by its name.
+    bool isPicture(const platform::Url& url, const ItemFacts& facts) const;
+
+private:
+    struct Kind {
+        std::string type;
+        bool isDirectory;
+        bool isPackage;
+    };
+    Kind kind(const platform::Url& url, const ItemFacts& facts) const;
+    std::string localizedName(const platform::Url& url, const ItemFacts& facts) const;
+    std::optional<std::string> description(const std::string& type) const;
+    void set(platform::AttributeMap& map, platform::AttributeKey key, const platform::Url& url,
+        const ItemFacts& facts, const Kind& kind) const;
+
+    std::shared_ptr<const platform::TypeRegistry> _types;
+    std::shared_ptr<const platform::DocumentContainers> _containers;
+    std::shared_ptr<const platform::Localization> _localization;
+    platform::Url _defaultContainer;
+};
+
+} // namespace host::drive

@@ -1,0 +1,24 @@
+#pragma once
+
+#include "host/drive/records/DriveLayout.h"
+#include "platform/CloudAccount.h"
+
+namespace host::drive {
+
+/// The account that account.json names, with the free space of the file system that holds the drive.
+class LocalAccount : public platform::CloudAccount {
+public:
+    explicit LocalAccount(DriveLayout layout)
+        : _layout(std::move(layout))
+    {
+    }
+
+    std::optional<platform::PropertyValue> identityToken() const override;
+    platform::Work makeQuotaFetchOperation(
+        std::function<void(platform::Result<std::int64_t>)> completion) const override;
+
+private:
+    DriveLayout _layout;
+};
+
+} // namespace host::drive

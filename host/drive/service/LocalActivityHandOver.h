@@ -1,0 +1,67 @@
+#pragma once
+
+#include "host/drive/records/ActivityRecord.h"
+#include "host/drive/records/DriveDependencies.h"
+#include "host/drive/records/DriveLayout.h"
+#include "host/drive/records/FollowedFolder.h"
+#include "host/drive/service/ActivityPublication.h"
+#include "platform/ActivityHandOver.h"
+#include "platform/Error.h"
+#include "platform/NotificationCenter.h"
+
+#include <memory>
+#include <vector>
+
+namespace platform {
+class CloudDocumentService;
+}
+
+namespace host::drive {
+
+/// Hands activities over by small files in the account's folder, one for each device. Make and destroy it on
+/// the main thread.
+class LocalActivityHandOver : public platform::ActivityHandOver,
+                              public std::enable_shared_from_this<LocalActivityHandOver> {
+public:
+    using Activity = ActivityPublication::Activity;
+
+    /// More devices than this are not looked at.
+    static constexpr std::size_t mostDevices = 64;
+
+    /// `cloud` finds the documents of what is offered.
+    static std::shared_ptr<LocalActivityHandOver> create(const DriveLayout& layout,
+        const DriveDependencies& dependencies, std::shared_ptr<platform::CloudDocumentService> cloud);
+
+    void becomeCurrent(const Activity& activity) override { _publication->becomeCurrent(activity); }
+    void resignCurrent(const Activity& activity) override { _publication->resignCurrent(activity); }
+    std::vector<platform::ActivityOffer> offers() const override { return _offers; }
+
+private:
+    using Records = std::vector<ActivityRecord>;
+
+    LocalActivityHandOver(const DriveLayout& layout, const DriveDependencies& dependencies,
+        std::shared_ptr<platform::CloudDocumentService> cloud);
+
+    void begin();
+    void readAgain();
+    void recordsRead(Records records);
+    void documentDecided(
+        unsigned reading, const ActivityRecord& record, const platform::Result<platform::Url>& document);
+    void readingEnded();
+    void readAgainWhenOneIsOld();
+
+    DriveLayout _layout;
+    std::shared_ptr<platform::Dispatch> _dispatch;
+    std::shared_ptr<platform::NotificationCenter> _notifications;
+    std::shared_ptr<platform::CloudDocumentService> _cloud;
+    std::shared_ptr<platform::Queue> _queue;
+    std::shared_ptr<ActivityPublication> _publication;
+    std::shared_ptr<FollowedFolder> _folder;
+    platform::Observation _identity;
+    std::vector<platform::ActivityOffer> _offers, _found;
+    std::size_t _undecided = 0; ///< records of the latest reading whose documents are looked for
+    unsigned _reading = 0; ///< the latest one; what comes from an older one is dropped
+    bool _readingWaits = false, _readAgain = false;
+};
+
+} // namespace host::drive

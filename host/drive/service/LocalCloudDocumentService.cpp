@@ -1,0 +1,40 @@
+#include "host/drive/service/LocalCloudDocumentService.h"
+
+#include "host/drive/changes/LocalCloudStore.h"
+#include "host/drive/changes/Recovery.h"
+
+namespace host::drive {
+
+std::shared_ptr<LocalCloudDocumentService> LocalCloudDocumentService::create(
+    const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings)
+{
+    return std::shared_ptr<LocalCloudDocumentService>(
+        new LocalCloudDocumentService(layout.prepare(), dependencies, settings));
+}
+
+LocalCloudDocumentService::LocalCloudDocumentService(
+    const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings)
+    : _layout(layout)
+    , _account(layout)
+    , _store(std::make_shared<LocalCloudStore>(layout))
+    , _identifiers(LocalDocumentIdentifiers::create(layout, dependencies.dispatch))
+    , _itemChanges(std::make_shared<IndexedItemChanges>(layout, _store, _identifiers))
+    , _containers(std::make_shared<LocalContainers>(layout, settings.languages, _itemChanges))
+    , _promisedItems(layout,
+          ItemAttributes(dependencies.typeRegistry, _containers, dependencies.localization,
+              layout.defaultContainerURL()),
+          ThumbnailCache::create(settings.thumbnailFolder, dependencies.dispatch), _identifiers)
+    , _items(layout, _itemChanges, _identifiers, _store, dependencies.dispatch,
+          dependencies.notificationCenter)
+    , _storageOffers(LocalStorageOfferManager::create(layout, dependencies))
+    , _keyValueStore(LocalKeyValueStore::create(layout, dependencies))
+    , _monitor(AccountMonitor::start(layout, dependencies))
+{
+    Recovery(layout, *_store).run();
+    _monitor->onFileChanged([weak = std::weak_ptr(_storageOffers)] {
+        if (const auto offers = weak.lock())
+            offers->accountFileChanged();
+    });
+}
+
+} // namespace host::drive

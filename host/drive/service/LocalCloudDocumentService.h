@@ -1,0 +1,65 @@
+#pragma once
+
+#include "host/drive/records/DriveDependencies.h"
+#include "host/drive/service/AccountMonitor.h"
+#include "host/drive/service/LocalAccount.h"
+#include "host/drive/service/LocalCloudItems.h"
+#include "host/drive/service/LocalContainers.h"
+#include "host/drive/service/LocalKeyValueStore.h"
+#include "host/drive/service/LocalPromisedItems.h"
+#include "host/drive/service/LocalStorageOfferManager.h"
+#include "host/drive/service/ThumbnailCache.h"
+#include "platform/CloudDocumentService.h"
+
+namespace host::drive {
+
+/// The cloud document service on a folder of this machine. Make and destroy it on the main thread.
+class LocalCloudDocumentService : public platform::CloudDocumentService,
+                                  public platform::SecurityScopedAccess {
+public:
+    struct Settings {
+        std::vector<std::string> languages; ///< for the containers' names, the preferred one first
+        std::string thumbnailFolder = ThumbnailCache::sharedFolder();
+    };
+
+    /// Makes the drive's home folder when it is missing, and begins to watch the account.
+    static std::shared_ptr<LocalCloudDocumentService> create(
+        const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings);
+
+    const DriveLayout& layout() const { return _layout; }
+    /// What changes the drive's items; for the file system that is installed beside this service.
+    std::shared_ptr<IndexedItemChanges> itemChanges() const { return _itemChanges; }
+    /// The account's storage offer; it follows the same file.
+    const std::shared_ptr<LocalStorageOfferManager>& storageOffers() const { return _storageOffers; }
+    /// The values that the account's devices share.
+    const std::shared_ptr<LocalKeyValueStore>& keyValueStore() const { return _keyValueStore; }
+
+    platform::CloudAccount& account() override { return _account; }
+    platform::PromisedItems& promisedItems() override { return _promisedItems; }
+    platform::DocumentContainers& containers() override { return *_containers; }
+    platform::CloudItems& items() override { return _items; }
+    platform::DocumentIdentifiers& documentIdentifiers() override { return *_identifiers; }
+    platform::SecurityScopedAccess& securityScopedAccess() override { return *this; }
+
+    // Everything of the local store may be used by its user at any time: no leave is needed.
+    bool startAccessing(const platform::Url&) override { return false; }
+    void stopAccessing(const platform::Url&) override { }
+
+private:
+    LocalCloudDocumentService(
+        const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings);
+
+    DriveLayout _layout;
+    LocalAccount _account;
+    std::shared_ptr<CloudStore> _store;
+    std::shared_ptr<LocalDocumentIdentifiers> _identifiers;
+    std::shared_ptr<IndexedItemChanges> _itemChanges;
+    std::shared_ptr<LocalContainers> _containers;
+    LocalPromisedItems _promisedItems;
+    LocalCloudItems _items;
+    std::shared_ptr<LocalStorageOfferManager> _storageOffers;
+    std::shared_ptr<LocalKeyValueStore> _keyValueStore;
+    std::shared_ptr<AccountMonitor> _monitor;
+};
+
+} // namespace host::drive

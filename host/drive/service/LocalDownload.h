@@ -1,0 +1,40 @@
+#pragma once
+
+#include "host/drive/changes/CloudStore.h"
+#include "platform/Dispatch.h"
+#include "platform/ItemDownload.h"
+
+#include <memory>
+
+namespace host::drive {
+
+/// A download on a queue of the background, whose handlers run on the main queue.
+class LocalDownload : public platform::ItemDownload {
+public:
+    /// What downloads stand on; it outlives them.
+    struct Setting {
+        DriveLayout layout;
+        std::shared_ptr<CloudStore> store;
+        std::shared_ptr<platform::OperationQueue> queue;
+        std::shared_ptr<platform::Queue> mainQueue;
+    };
+
+    static std::unique_ptr<LocalDownload> start(
+        const Setting& setting, const std::string& path, platform::DownloadHandlers handlers);
+
+    ~LocalDownload() override { cancel(); }
+    void cancel() override;
+
+private:
+    struct State;
+    explicit LocalDownload(std::shared_ptr<State> state)
+        : _state(std::move(state))
+    {
+    }
+    static CloudStore::Continue tell(
+        const std::shared_ptr<State>& state, std::uint64_t done, const std::optional<std::uint64_t>& total);
+
+    std::shared_ptr<State> _state;
+};
+
+} // namespace host::drive

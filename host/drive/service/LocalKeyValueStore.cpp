@@ -1,0 +1,143 @@
+#include "host/drive/service/LocalKeyValueStore.h"
+
+#include "host/drive/records/JsonObject.h"
+#include "host/drive/records/SmallFile.h"
+#include "platform/Log.h"
+
+namespace host::drive {
+
+namespace {
+
+using nlohmann::json;
+using platform::PropertyArray;
+using platform::PropertyDictionary;
+using platform::PropertyValue;
+
+PropertyValue valueOf(const json& value);
+
+PropertyDictionary dictionaryOf(const json& object)
+{
+    PropertyDictionary dictionary;
+    for (const auto& [key, value] : object.items())
+        dictionary.emplace(key, valueOf(value));
+    return dictionary;
+}
+
+PropertyArray arrayOf(const json& list)
+{
+    PropertyArray array;
+    for (const auto& value : list)
+        array.push_back(valueOf(value));
+    return array;
+}
+
+PropertyValue valueOf(const json& value)
+{
+    switch (value.type()) {
+    case json::value_t::boolean:
+        return value.get<bool>();
+    case json::value_t::number_unsigned:
+        return value.get<std::uint64_t>();
+    case json::value_t::number_integer:
+        return value.get<std::int64_t>();
+    case json::value_t::number_float:
+        return value.get<double>();
+    case json::value_t::string:
+        return value.get<std::string>();
+    case json::value_t::array:
+        return arrayOf(value);
+    case json::value_t::object:
+        return dictionaryOf(value);
+    default:
+        return {};
+    }
+}
+
+PropertyDictionary readValues(const std::string& path)
+{
+    static constexpr platform::Operation op{"-[LocalKeyValueStore readValues]"};
+    const auto text = readSmallFile(path, LocalKeyValueStore::maximumFileSize);
+    if (!text) {
+        if (!text.error->is(platform::FileErrorCode::NoSuchItem))
+            op.error("Cannot read %@: %{public}@", path, reasonOf(*text.error));
+        return {};
+    }
+    const auto object = parseJsonObject(*text);
+    if (!object)
+        op.error("%@ is damaged: it is no JSON object", path);
+    return object ? dictionaryOf(*object) : PropertyDictionary();
+}
+
+} // namespace
+
+std::shared_ptr<LocalKeyValueStore> LocalKeyValueStore::create(
+    const DriveLayout& layout, const DriveDependencies& dependencies)
+{
+    std::shared_ptr<LocalKeyValueStore> store(new LocalKeyValueStore(layout, dependencies));
+    store->begin();
+    return store;
+}
+
+LocalKeyValueStore::LocalKeyValueStore(const DriveLayout& layout, const DriveDependencies& dependencies)
+    : _layout(layout)
+    , _dispatch(dependencies.dispatch)
+    , _notifications(dependencies.notificationCenter)
+    , _queue(_dispatch->makeSerialQueue("TarrowDriveAppID.keyvalue"))
+{
+}
+
+void LocalKeyValueStore::begin()
+{
+    static constexpr platform::Operation op{"-[LocalKeyValueStore begin]"};
+    // The folder is watched rather than the file, so that its creation and its replacement are seen.
+    _folder = FollowedFolder::follow(_dispatch, _layout.home(), FollowedFolder::IfMissing::Wait,
+        [weak = weak_from_this()](const auto& names) {
+            const auto self = weak.lock();
+            if (self && mayHaveChanged(names, DriveLayout::keyValueFileName))
+                self->readAgain();
+        });
+    if (!_folder->isWatched())
+        op.warning("Cannot watch the key-value store's folder %@", _layout.home());
+}
+
+void LocalKeyValueStore::readAgain()
+{
+    {
+        const std::lock_guard lock(_mutex);
+        if (!_values)
+            return; // What nobody has asked for is not read.
+    }
+    if (_readingWaits->exchange(true))
+        return;
+    _queue->async([weak = weak_from_this(), waits = _readingWaits, path = _layout.keyValueStore(),
+                      main = _dispatch->mainQueue()] {
+        // Before the reading, so that a change during it leads to another one.
+        waits->store(false);
+        main->async([weak, values = readValues(path)] {
+            if (const auto self = weak.lock())
+                self->valuesRead(values);
+        });
+    });
+}
+
+void LocalKeyValueStore::valuesRead(PropertyDictionary values)
+{
+    {
+        const std::lock_guard lock(_mutex);
+        if (_values == values)
+            return;
+        _values = std::move(values);
+    }
+    _notifications->post(platform::Notification::KeyValueStoreDidChangeExternally);
+}
+
+std::optional<PropertyValue> LocalKeyValueStore::objectForKey(const std::string& key) const
+{
+    const std::lock_guard lock(_mutex);
+    if (!_values)
+        _values = readValues(_layout.keyValueStore());
+    const auto* value = find(*_values, key);
+    return value ? std::optional(*value) : std::nullopt;
+}
+
+} // namespace host::drive

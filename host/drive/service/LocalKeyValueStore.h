@@ -1,0 +1,48 @@
+#pragma once
+
+#include "host/drive/records/DriveDependencies.h"
+#include "host/drive/records/DriveLayout.h"
+#include "host/drive/records/FollowedFolder.h"
+#include "platform/Dispatch.h"
+#include "platform/KeyValueStore.h"
+#include "platform/NotificationCenter.h"
+
+#include <atomic>
+#include <memory>
+#include <mutex>
+
+namespace host::drive {
+
+/// The account's key-value store, a JSON object in a file that is watched. A file that cannot be used is
+/// named in one log line for each time it changes, and is as if it were not there. Make and destroy it on the
+/// main thread.
+class LocalKeyValueStore : public platform::KeyValueStore,
+                           public std::enable_shared_from_this<LocalKeyValueStore> {
+public:
+    /// Largest file that is read, in bytes.
+    static constexpr std::size_t maximumFileSize = 1024 * 1024;
+
+    static std::shared_ptr<LocalKeyValueStore> create(
+        const DriveLayout& layout, const DriveDependencies& dependencies);
+
+    /// The first call reads the file; later changes are read on a queue.
+    std::optional<platform::PropertyValue> objectForKey(const std::string& key) const override;
+
+private:
+    LocalKeyValueStore(const DriveLayout& layout, const DriveDependencies& dependencies);
+
+    void begin();
+    void readAgain();
+    void valuesRead(platform::PropertyDictionary values);
+
+    DriveLayout _layout;
+    std::shared_ptr<platform::Dispatch> _dispatch;
+    std::shared_ptr<platform::NotificationCenter> _notifications;
+    std::shared_ptr<platform::Queue> _queue;
+    std::shared_ptr<FollowedFolder> _folder;
+    const std::shared_ptr<std::atomic_bool> _readingWaits = std::make_shared<std::atomic_bool>(false);
+    mutable std::mutex _mutex;
+    mutable std::optional<platform::PropertyDictionary> _values; ///< nothing before the first reading
+};
+
+} // namespace host::drive

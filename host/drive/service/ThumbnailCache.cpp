@@ -1,0 +1,168 @@
+#include "host/drive/service/ThumbnailCache.h"
+
+#include "platform/Log.h"
+
+#include <gdk-pixbuf/gdk-pixbuf.h>
+#include <unistd.h>
+
+#include <cstdio>
+#include <filesystem>
+
+namespace host::drive {
+
+namespace {
+
+using platform::Image;
+
+struct Unref {
+    void operator()(GdkPixbuf* pixbuf) const { g_object_unref(pixbuf); }
+};
+using Pixbuf = std::unique_ptr<GdkPixbuf, Unref>;
+
+struct FreeText {
+    void operator()(char* text) const { g_free(text); }
+};
+using Text = std::unique_ptr<char, FreeText>;
+
+std::string uriOf(const std::string& path)
+{
+    const Text uri(g_filename_to_uri(path.c_str(), nullptr, nullptr));
+    return uri ? uri.get() : "";
+}
+
+std::string seconds(platform::Date date)
+{
+    return std::to_string(date.nanoseconds / 1'000'000'000);
+}
+
+std::string entryPath(const std::string& folder, const std::string& uri)
+{
+    const Text name(g_compute_checksum_for_string(G_CHECKSUM_MD5, uri.c_str(), -1));
+    return folder + "/xx-large/" + name.get() + ".png";
+}
+
+std::uint32_t premultiplied(const guchar* pixel, bool hasAlpha)
+{
+    const unsigned alpha = hasAlpha ? pixel[3] : 255;
+    const auto channel = [alpha](unsigned value) { return (value * alpha + 127) / 255; };
+    return alpha << 24 | channel(pixel[0]) << 16 | channel(pixel[1]) << 8 | channel(pixel[2]);
+}
+
+Image imageFrom(GdkPixbuf* pixbuf)
+{
+    const int width = gdk_pixbuf_get_width(pixbuf), height = gdk_pixbuf_get_height(pixbuf);
+    const int channels = gdk_pixbuf_get_n_channels(pixbuf), stride = gdk_pixbuf_get_rowstride(pixbuf);
+    const bool hasAlpha = gdk_pixbuf_get_has_alpha(pixbuf);
+    const guchar* bytes = gdk_pixbuf_read_pixels(pixbuf);
+    std::vector<std::uint32_t> pixels;
+    pixels.reserve(static_cast<std::size_t>(width) * static_cast<std::size_t>(height));
+    for (int y = 0; y < height; ++y) {
+        for (int x = 0; x < width; ++x)
+            pixels.push_back(
+                premultiplied(bytes + y * static_cast<std::ptrdiff_t>(stride) + x * channels, hasAlpha));
+    }
+    return Image::fromPixels(width, height, 1, std::move(pixels));
+}
+
+// The entry for this version of the file; none when it is missing, or made from another version.
+Pixbuf readEntry(const std::string& folder, const std::string& uri, platform::Date modified)
+{
+    const auto path = entryPath(folder, uri);
+    if (::access(path.c_str(), R_OK) != 0)
+        return nullptr;
+    Pixbuf entry(gdk_pixbuf_new_from_file(path.c_str(), nullptr));
+    const char* time = entry ? gdk_pixbuf_get_option(entry.get(), "tEXt::Thumb::MTime") : nullptr;
+    const char* name = entry ? gdk_pixbuf_get_option(entry.get(), "tEXt::Thumb::URI") : nullptr;
+    return time && name && seconds(modified) == time && uri == name ? std::move(entry) : nullptr;
+}
+
+Pixbuf scaledPicture(const std::string& path)
+{
+    int width = 0, height = 0;
+    if (!gdk_pixbuf_get_file_info(path.c_str(), &width, &height) || width <= 0 || height <= 0
+        || std::int64_t{width} * height > ThumbnailCache::mostPixels)
+        return nullptr;
+    const int side = std::min(ThumbnailCache::pixelSize, std::max(width, height));
+    const Pixbuf picture(gdk_pixbuf_new_from_file_at_scale(path.c_str(), side, side, TRUE, nullptr));
+    return picture ? Pixbuf(gdk_pixbuf_apply_embedded_orientation(picture.get())) : nullptr;
+}
+
+// Under a temporary name first, so that other programs never read half of it.
+void writeEntry(const std::string& folder, GdkPixbuf* pixbuf, const std::string& uri, platform::Date modified)
+{
+    static constexpr platform::Operation op{"-[ThumbnailCache writeEntry:]"};
+    std::error_code error;
+    std::filesystem::create_directories(folder + "/xx-large", error);
+    std::filesystem::permissions(folder + "/xx-large", std::filesystem::perms::owner_all, error);
+    auto temporary = folder + "/xx-large/.tarrow-XXXXXX";
+    const int file = ::mkstemp(temporary.data()); // readable by its owner only, as the cache's rules ask
+    if (file < 0)
+        return;
+    ::close(file);
+    const auto time = seconds(modified);
+    const bool written = gdk_pixbuf_save(pixbuf, temporary.c_str(), "png", nullptr, "tEXt::Thumb::URI",
+        uri.c_str(), "tEXt::Thumb::MTime", time.c_str(), "tEXt::Software", "Tarrow Drive", "compression", "3",
+        nullptr);
+    if (!written || std::rename(temporary.c_str(), entryPath(folder, uri).c_str()) != 0) {
+        op.warning("Cannot write a thumbnail below %@", folder);
+        ::unlink(temporary.c_str());
+    }
+}
+
+Pixbuf make(const std::string& folder, const std::string& path, platform::Date modified)
+{
+    auto picture = scaledPicture(path);
+    if (picture)
+        writeEntry(folder, picture.get(), uriOf(path), modified);
+    return picture;
+}
+
+} // namespace
+
+std::shared_ptr<ThumbnailCache> ThumbnailCache::create(
+    std::string folder, std::shared_ptr<platform::Dispatch> dispatch)
+{
+    return std::shared_ptr<ThumbnailCache>(new ThumbnailCache(std::move(folder), std::move(dispatch)));
+}
+
+ThumbnailCache::ThumbnailCache(std::string folder, std::shared_ptr<platform::Dispatch> dispatch)
+    : _folder(std::move(folder))
+    , _dispatch(std::move(dispatch))
+    , _queue(_dispatch->makeOperationQueue(
+          "TarrowDriveAppID.thumbnails", platform::QualityOfService::Background))
+{
+}
+
+std::string ThumbnailCache::sharedFolder()
+{
+    return std::string(g_get_user_cache_dir()) + "/thumbnails";
+}
+
+platform::ThumbnailMap ThumbnailCache::thumbnails(
+    const platform::Url& url, platform::Date modified, IfMissing ifMissing)
+{
+    auto picture = readEntry(_folder, uriOf(url.path()), modified);
+    if (!picture && ifMissing == IfMissing::MakeFromPicture) {
+        if (_dispatch->isMainThread())
+            makeLater(url.path(), modified);
+        else
+            picture = make(_folder, url.path(), modified);
+    }
+    return picture ? platform::ThumbnailMap{{pixelSize, imageFrom(picture.get())}} : platform::ThumbnailMap{};
+}
+
+void ThumbnailCache::makeLater(const std::string& path, platform::Date modified)
+{
+    const std::lock_guard lock(_mutex);
+    if (!_beingMade.insert(path).second)
+        return;
+    _queue->addOperation([weak = weak_from_this(), folder = _folder, path, modified] {
+        make(folder, path, modified);
+        if (const auto self = weak.lock()) {
+            const std::lock_guard inner(self->_mutex);
+            self->_beingMade.erase(path);
+        }
+    });
+}
+
+} // namespace host::drive

@@ -1,0 +1,394 @@
+#include "host/drive/changes/HeldItem.h"
+#include "host/drive/changes/LocalCloudStore.h"
+#include "host/drive/changes/LocalItemChanges.h"
+#include "host/drive/changes/Recovery.h"
+#include "host/drive/records/ItemFacts.h"
+#include "tests/support/DriveFixture.h"
+
+#include <gmock/gmock.h>
+
+#include <fcntl.h>
+#include <sched.h>
+#include <sys/mount.h>
+#include <sys/stat.h>
+#include <sys/wait.h>
+#include <sys/xattr.h>
+
+#include <cerrno>
+#include <filesystem>
+#include <fstream>
+#include <functional>
+#include <iterator>
+
+namespace {
+
+namespace fs = std::filesystem;
+
+using host::drive::DriveEntry;
+using host::drive::HeldItem;
+using host::drive::LocalItemChanges;
+using platform::FileErrorCode;
+using platform::Url;
+
+class ItemChangesTest : public testing::Test, public testing_support::DriveFixture {
+protected:
+    LocalItemChanges changes() const
+    {
+        return {layout(), std::make_shared<host::drive::LocalCloudStore>(layout())};
+    }
+    void recover() const
+    {
+        host::drive::LocalCloudStore store(layout());
+        host::drive::Recovery(layout(), store).run();
+    }
+    static std::string contentOf(const std::string& path)
+    {
+        std::ifstream file(path);
+        return {std::istreambuf_iterator<char>(file), {}};
+    }
+    std::optional<HeldItem> take(const Url& item) const
+    {
+        std::optional<HeldItem> held;
+        const auto entry = DriveEntry::open(layout(), item.path());
+        EXPECT_EQ(HeldItem::take(layout(), *entry, entry->name, held), 0);
+        return held;
+    }
+    static std::string markOf(const std::string& path, const char* name)
+    {
+        char value[64];
+        const auto length = ::getxattr(path.c_str(), name, value, sizeof value);
+        return length < 0 ? std::string() : std::string(value, static_cast<std::size_t>(length));
+    }
+    std::size_t heldCount() const
+    {
+        return static_cast<std::size_t>(
+            std::distance(fs::directory_iterator(layout().held()), fs::directory_iterator()));
+    }
+    bool hasTemporary(const std::string& folder) const
+    {
+        return std::any_of(fs::directory_iterator(folder), fs::directory_iterator(),
+            [](const auto& entry) { return entry.path().filename().string().starts_with(".trw"); });
+    }
+    /// Runs the body in a process of its own that may mount; nothing where that is not allowed. The body
+    /// answers the number of what went wrong, 0 for nothing.
+    static std::optional<int> withMounts(const std::function<int()>& body)
+    {
+        constexpr int notAllowed = 99;
+        const auto child = ::fork();
+        if (child == 0) {
+            const bool isAlone = ::unshare(::geteuid() == 0 ? CLONE_NEWNS : CLONE_NEWNS | CLONE_NEWUSER) == 0
+                && ::mount("none", "/", nullptr, MS_REC | MS_PRIVATE, nullptr) == 0;
+            ::_exit(isAlone ? body() : notAllowed);
+        }
+        int status = 0;
+        ::waitpid(child, &status, 0);
+        const int result = WIFEXITED(status) ? WEXITSTATUS(status) : 98;
+        return result == notAllowed ? std::nullopt : std::optional(result);
+    }
+};
+
+TEST_F(ItemChangesTest, WhatReplacedTheItemIsKeptAlsoWithItsDateAndSize)
+{
+    const auto url = writeDocument("a.txt", "old");
+    const auto version = changes().versionOfItem(url.path());
+    ASSERT_TRUE(version);
+    const auto date = fs::last_write_time(url.path());
+    writeDocument("other", "new");
+    fs::rename(this->url("other").path(), url.path());
+    fs::last_write_time(url.path(), date);
+    const auto error = changes().removeItem(url.path(), version);
+    ASSERT_TRUE(error);
+    EXPECT_TRUE(error->is(FileErrorCode::Cancelled));
+    EXPECT_EQ(contentOf(url.path()), "new");
+    EXPECT_FALSE(changes().removeItem(url.path(), changes().versionOfItem(url.path())));
+    EXPECT_FALSE(fs::exists(url.path()));
+    EXPECT_EQ(heldCount(), 0U);
+}
+
+TEST_F(ItemChangesTest, RemovesFoldersHoweverDeepTheyLie)
+{
+    const auto url = makeFolder("deep");
+    int folder = ::open(url.path().c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    for (int level = 0; level < 3000; ++level) {
+        ASSERT_EQ(::mkdirat(folder, "level", 0755), 0);
+        ::close(::openat(folder, "file", O_CREAT | O_WRONLY | O_CLOEXEC, 0644));
+        const int next = ::openat(folder, "level", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+        ::close(folder);
+        folder = next;
+    }
+    ::close(folder);
+    EXPECT_FALSE(changes().removeItem(url.path(), std::nullopt));
+    EXPECT_FALSE(fs::exists(url.path()));
+    EXPECT_EQ(heldCount(), 0U);
+}
+
+TEST_F(ItemChangesTest, AHeldItemComesBackUnlessANewerOneTookItsPlace)
+{
+    const auto url = writeDocument("a.txt", "old");
+    {
+        const auto held = take(url);
+        EXPECT_FALSE(fs::exists(url.path()));
+        recover();
+        EXPECT_FALSE(fs::exists(url.path())) << "it is still being worked on";
+    }
+    EXPECT_EQ(contentOf(url.path()), "old");
+    EXPECT_EQ(heldCount(), 0U);
+    {
+        const auto held = take(url);
+        writeDocument("a.txt", "new");
+    }
+    EXPECT_EQ(contentOf(url.path()), "new");
+    fs::remove(url.path());
+    recover();
+    EXPECT_EQ(contentOf(url.path()), "old") << "both were kept";
+}
+
+TEST_F(ItemChangesTest, TheNextStartPutsBackWhatAKilledProcessHeld)
+{
+    const auto url = writeDocument("Documents/a.txt", "old");
+    const auto child = ::fork();
+    if (child == 0) {
+        const auto held = take(url);
+        ::kill(::getpid(), SIGKILL);
+    }
+    ::waitpid(child, nullptr, 0);
+    EXPECT_FALSE(fs::exists(url.path()));
+    recover();
+    EXPECT_EQ(contentOf(url.path()), "old");
+    EXPECT_EQ(heldCount(), 0U);
+}
+
+TEST_F(ItemChangesTest, MovesToAnotherFileSystemAndBack)
+{
+    const auto small = makeFolder("small"), target = small.appendingPathComponent("tree");
+    const auto file = writeDocument("tree/sub/a.txt", std::string(100'000, 'x'));
+    writeLink("tree/link", "sub/a.txt");
+    const auto big = writeDocument("big", std::string(2'000'000, 'y'));
+    const auto tree = url("tree");
+    const auto result = withMounts([&] {
+        if (::mount("tmpfs", small.path().c_str(), "tmpfs", 0, "size=1m") != 0)
+            return 99;
+        ::chmod(file.path().c_str(), 0640);
+        const auto date = fs::last_write_time(file.path());
+        if (changes().moveItem(tree.path(), target.path()) || fs::exists(tree.path()))
+            return 1;
+        const auto moved = target.path() + "/sub/a.txt";
+        if (contentOf(moved).size() != 100'000 || fs::last_write_time(moved) != date
+            || fs::status(moved).permissions() != fs::perms(0640)
+            || fs::read_symlink(target.path() + "/link") != "sub/a.txt")
+            return 2;
+        const auto full = changes().moveItem(big.path(), small.path() + "/big");
+        if (!full || full->code() != ENOSPC || contentOf(big.path()).size() != 2'000'000)
+            return 3;
+        const auto taken = changes().moveItem(big.path(), target.path());
+        if (!taken || !taken->is(FileErrorCode::ItemExists) || hasTemporary(small.path()))
+            return 4;
+        ::mkfifo((target.path() + "/sub/pipe").c_str(), 0600);
+        const auto refused = changes().moveItem(target.path(), tree.path());
+        if (!refused || refused->code() != EOPNOTSUPP || !fs::exists(moved) || fs::exists(tree.path()))
+            return 5;
+        fs::remove(target.path() + "/sub/pipe");
+        if (changes().moveItem(target.path(), tree.path()) || fs::exists(target.path()) || heldCount() != 0)
+            return 6;
+        if (changes().moveItem(tree.path(), target.path())
+            || changes().removeItem(target.path(), std::nullopt))
+            return 7;
+        return fs::is_empty(small.path()) && !hasTemporary(layout().defaultContainer()) ? 0 : 8;
+    });
+    if (!result)
+        GTEST_SKIP() << "nothing can be mounted here";
+    EXPECT_EQ(result, 0);
+}
+
+TEST_F(ItemChangesTest, ReplacesAContentAndKeepsWhatBelongsToTheDocument)
+{
+    const auto item = writeDocument("plan.pdf", "old");
+    mark(item, host::drive::itemMark::tags, "Work,Urgent");
+    mark(item, host::drive::itemMark::documentIdentifier, "77");
+    ::chmod(item.path().c_str(), 0640);
+    const auto before = changes().contentToReplace(item.path(), 100);
+    ASSERT_TRUE(before);
+    EXPECT_EQ(*before->bytes, "old");
+    // Another tag and another copy of the same bytes are no other content.
+    mark(item, host::drive::itemMark::tags, "Work");
+    const auto after = changes().replaceContent(item.path(), *before, "new and longer");
+    ASSERT_TRUE(after);
+    EXPECT_EQ(contentOf(item.path()), "new and longer");
+    EXPECT_EQ(changes().versionOfItem(item.path()), *after.value);
+    EXPECT_EQ(markOf(item.path(), host::drive::itemMark::tags), "Work");
+    EXPECT_EQ(markOf(item.path(), host::drive::itemMark::documentIdentifier), "77");
+    EXPECT_EQ(fs::status(item.path()).permissions(), fs::perms(0640));
+
+    const auto copy = url("plan 2.pdf");
+    EXPECT_FALSE(changes().addDocument(copy.path(), item.path(), "copy"));
+    EXPECT_EQ(contentOf(copy.path()), "copy");
+    EXPECT_EQ(markOf(copy.path(), host::drive::itemMark::tags), "Work");
+    EXPECT_EQ(markOf(copy.path(), host::drive::itemMark::documentIdentifier), "");
+    const auto taken = changes().addDocument(copy.path(), item.path(), "other");
+    EXPECT_TRUE(taken && taken->is(FileErrorCode::ItemExists));
+    EXPECT_EQ(contentOf(copy.path()), "copy");
+    EXPECT_FALSE(hasTemporary(layout().defaultContainer()));
+    EXPECT_EQ(heldCount(), 0U);
+}
+
+TEST_F(ItemChangesTest, RefusesToReplaceWhatIsNotTheContentThatWasRead)
+{
+    const auto item = writeDocument("plan.pdf", "old");
+    const auto before = changes().contentToReplace(item.path(), 100);
+    ASSERT_TRUE(before);
+    const auto refusal = [&] { return changes().replaceContent(item.path(), *before, "ours").error; };
+    writeDocument("plan.pdf", "its");
+    EXPECT_TRUE(refusal()->is(FileErrorCode::Cancelled)) << "of the same length";
+    EXPECT_EQ(contentOf(item.path()), "its");
+    fs::remove(item.path());
+    EXPECT_TRUE(refusal()->is(FileErrorCode::NoSuchItem));
+    EXPECT_FALSE(fs::exists(item.path()));
+    writeLink("plan.pdf", folder().write("outside.pdf", "old"));
+    EXPECT_TRUE(refusal());
+    EXPECT_EQ(contentOf(folder().at("outside.pdf")), "old");
+    fs::remove(item.path());
+    writeDocument("plan.pdf", "old");
+    EXPECT_FALSE(refusal()) << "the very same content came back";
+
+    EXPECT_EQ(changes().contentToReplace(item.path(), 3).error->code(), EFBIG);
+    ::chmod(item.path().c_str(), 0444);
+    EXPECT_EQ(changes().contentToReplace(item.path(), 100).error->code(), EACCES);
+    EXPECT_FALSE(hasTemporary(layout().defaultContainer()));
+    EXPECT_EQ(heldCount(), 0U);
+}
+
+TEST_F(ItemChangesTest, AFullDiskKeepsTheContentThatIsThere)
+{
+    const auto small = makeFolder("small"), item = small.appendingPathComponent("plan.pdf");
+    const auto result = withMounts([&] {
+        if (::mount("tmpfs", small.path().c_str(), "tmpfs", 0, "size=64k") != 0)
+            return 99;
+        std::ofstream(item.path()) << "old";
+        const auto before = changes().contentToReplace(item.path(), 100);
+        const auto refused = changes().replaceContent(item.path(), *before, std::string(100'000, 'x'));
+        if (!refused.error || refused.error->code() != ENOSPC || contentOf(item.path()) != "old")
+            return 1;
+        return hasTemporary(small.path()) || heldCount() != 0 ? 2 : 0;
+    });
+    if (!result)
+        GTEST_SKIP() << "nothing can be mounted here";
+    EXPECT_EQ(result, 0);
+}
+
+TEST_F(ItemChangesTest, APromiseBesideADocumentGoesOnlyWhenItAddsNothing)
+{
+    fs::create_directories(layout().cloud());
+    const auto makeTwins = [&](const std::string& name, const char* behind) {
+        host::drive::PromiseRecord promise;
+        promise.content = "content";
+        fs::remove(layout().cloud() + "/content");
+        if (behind)
+            std::ofstream(layout().cloud() + "/content") << behind;
+        writePromise(name, promise);
+        return writeDocument(name, "document");
+    };
+    const auto hasPromise = [](const Url& item) {
+        return fs::exists(host::drive::PromiseRecord::pathFor(item.path()));
+    };
+    for (const char* redundant : {static_cast<const char*>(nullptr), "document"}) {
+        const auto item = makeTwins("a.txt", redundant);
+        EXPECT_FALSE(changes().removeItem(item.path(), std::nullopt));
+        EXPECT_FALSE(fs::exists(item.path()) || hasPromise(item));
+        EXPECT_TRUE(fs::is_empty(layout().cloud()));
+    }
+    const auto item = makeTwins("a.txt", "unseen");
+    const auto refused = changes().evictItem(item.path());
+    ASSERT_TRUE(refused);
+    EXPECT_TRUE(refused->is(FileErrorCode::ItemExists));
+    EXPECT_EQ(contentOf(item.path()), "document");
+    EXPECT_FALSE(changes().moveItem(item.path(), url("moved.txt").path()));
+    EXPECT_TRUE(hasPromise(item) && !hasPromise(url("moved.txt")));
+    writeDocument("a.txt", "document");
+    EXPECT_FALSE(changes().removeItem(item.path(), std::nullopt));
+    EXPECT_TRUE(hasPromise(item));
+    EXPECT_EQ(contentOf(layout().cloud() + "/content"), "unseen");
+    EXPECT_FALSE(changes().removeItem(item.path(), std::nullopt)) << "the promise shows, and can be removed";
+    EXPECT_TRUE(fs::is_empty(layout().cloud()));
+}
+
+TEST_F(ItemChangesTest, WhatCannotBePutBackGoesToTheTrash)
+{
+    const auto folder = makeFolder("folder");
+    for (const auto& name : {"folder/a.txt", "b.txt"}) {
+        const auto item = writeDocument(name, "old");
+        const auto child = ::fork();
+        if (child == 0) {
+            const auto held = take(item);
+            ::kill(::getpid(), SIGKILL);
+        }
+        ::waitpid(child, nullptr, 0);
+    }
+    fs::remove_all(folder.path());
+    writeDocument("b.txt", "new");
+    std::ofstream(layout().trash() + "/b.txt") << "older";
+    recover();
+    EXPECT_EQ(heldCount(), 0U);
+    EXPECT_EQ(contentOf(url("b.txt").path()), "new");
+    EXPECT_EQ(contentOf(layout().trash() + "/a.txt"), "old");
+    EXPECT_EQ(contentOf(layout().trash() + "/b.txt"), "older");
+    EXPECT_EQ(contentOf(layout().trash() + "/b.txt 2"), "old");
+}
+
+TEST_F(ItemChangesTest, AMountIsNeitherEnteredNorALeadIntoOneself)
+{
+    const auto outside = folder().write("outside/kept.txt", "precious");
+    const auto tree = makeFolder("tree"), sub = makeFolder("tree/sub"), mounted = makeFolder("tree/mounted");
+    const auto other = makeFolder("other"), file = writeDocument("tree/a.txt", "a");
+    const auto result = withMounts([&] {
+        const auto bind = [](const std::string& from, const std::string& to) {
+            return ::mount(from.c_str(), to.c_str(), nullptr, MS_BIND, nullptr) == 0;
+        };
+        if (!bind(sub.path(), other.path()))
+            return 99;
+        const auto intoItself = changes().moveItem(tree.path(), other.path() + "/tree");
+        if (!intoItself || intoItself->code() != EINVAL || !fs::is_empty(sub.path()))
+            return 1;
+        if (!bind(folder().at("outside"), mounted.path()))
+            return 99;
+        const auto removed = changes().removeItem(tree.path(), std::nullopt);
+        if (!removed || removed->code() != EBUSY || contentOf(outside) != "precious")
+            return 2;
+        return contentOf(file.path()) == "a" && !hasTemporary(sub.path()) ? 0 : 3;
+    });
+    if (!result)
+        GTEST_SKIP() << "nothing can be mounted here";
+    EXPECT_EQ(result, 0);
+}
+
+TEST_F(ItemChangesTest, NothingChangesOnAReadOnlyDrive)
+{
+    const auto file = writeDocument("a.txt", "a");
+    const auto home = layout().home();
+    const auto result = withMounts([&] {
+        if (::mount(home.c_str(), home.c_str(), nullptr, MS_BIND, nullptr) != 0
+            || ::mount(nullptr, home.c_str(), nullptr, MS_BIND | MS_REMOUNT | MS_RDONLY, nullptr) != 0)
+            return 99;
+        const auto removed = changes().removeItem(file.path(), std::nullopt);
+        const auto moved = changes().moveItem(file.path(), url("b.txt").path());
+        const auto made = changes().createFolder(url("folder").path());
+        const auto evicted = changes().evictItem(file.path());
+        int wrong = 1;
+        for (const auto& error : {removed, moved, made, evicted}) {
+            if (!error || error->code() != EROFS)
+                return wrong;
+            ++wrong;
+        }
+        const auto refused = fileCoordinator->coordinateWriting(
+            file, platform::WritingOptions::None, [&](const Url&) { wrong = 0; });
+        if (!refused || refused->code() != EROFS || wrong == 0)
+            return 5;
+        fileCoordinator->coordinateReading(
+            file, platform::ReadingOptions::None, [&](const Url&) { wrong = 0; });
+        return wrong == 0 && contentOf(file.path()) == "a" ? 0 : 6;
+    });
+    if (!result)
+        GTEST_SKIP() << "nothing can be mounted here";
+    EXPECT_EQ(result, 0);
+}
+
+} // namespace

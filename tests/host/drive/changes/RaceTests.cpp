@@ -1,0 +1,228 @@
+#include "host/drive/changes/LocalCloudStore.h"
+#include "host/drive/changes/LocalItemChanges.h"
+#include "host/drive/changes/Recovery.h"
+#include "tests/support/DriveFixture.h"
+
+#include <gmock/gmock.h>
+
+#include <fcntl.h>
+
+#include <atomic>
+#include <filesystem>
+#include <fstream>
+#include <set>
+#include <thread>
+
+namespace {
+
+namespace fs = std::filesystem;
+
+using host::drive::LocalCloudStore;
+using host::drive::LocalItemChanges;
+using host::drive::PromiseRecord;
+using host::system::FileDescriptor;
+using platform::Url;
+
+/// Is asked between the look at a document and its removal or move, because a promise lies beside it: there
+/// it lets others work for as long as they like.
+class WindowStore : public LocalCloudStore {
+public:
+    using LocalCloudStore::LocalCloudStore;
+    bool holdsOtherThan(const std::string&, const FileDescriptor&) override
+    {
+        inTheWindow();
+        return true;
+    }
+    std::function<void()> inTheWindow = [] {};
+};
+
+/// Saves numbered versions of a document by replacing it, and knows which of them it replaced itself.
+class Saver {
+public:
+    Saver(std::string path, std::string temporary)
+        : _path(std::move(path))
+        , _temporary(std::move(temporary))
+    {
+    }
+    void save()
+    {
+        std::ofstream(_temporary) << ++_last;
+        const auto rename = [&](unsigned how) {
+            return ::renameat2(AT_FDCWD, _temporary.c_str(), AT_FDCWD, _path.c_str(), how) == 0;
+        };
+        while (!rename(RENAME_NOREPLACE)) {
+            if (!rename(RENAME_EXCHANGE))
+                continue;
+            int replaced = 0;
+            std::ifstream(_temporary) >> replaced;
+            accounted.insert(replaced);
+            fs::remove(_temporary);
+            break;
+        }
+        saved = _last;
+    }
+    /// Saves from now on, on a thread of its own, until it is stopped.
+    void start()
+    {
+        save();
+        _thread = std::thread([this] {
+            while (!_isOver) {
+                if (isResting)
+                    std::this_thread::yield();
+                else
+                    save();
+            }
+        });
+    }
+    void stop()
+    {
+        _isOver = true;
+        _thread.join();
+    }
+    std::atomic<int> saved = 0;
+    std::atomic<bool> isResting = false;
+    std::set<int> accounted; ///< of the saver's thread only
+
+private:
+    std::string _path, _temporary;
+    int _last = 0;
+    std::atomic<bool> _isOver = false;
+    std::thread _thread;
+};
+
+class RaceTest : public testing::Test, public testing_support::DriveFixture {
+protected:
+    static void write(const std::string& path, const std::string& text) { std::ofstream(path) << text; }
+    static std::string read(const std::string& path)
+    {
+        std::ifstream file(path);
+        return {std::istreambuf_iterator<char>(file), {}};
+    }
+    void promiseBeside(const std::string& name) const
+    {
+        PromiseRecord promise;
+        promise.content = "other";
+        writePromise(name, promise);
+    }
+    /// Every version that was saved lies somewhere, or was replaced by its saver, or is one of these.
+    void expectNoneLost(const Saver& saver, std::set<int> accounted)
+    {
+        accounted.insert(saver.accounted.begin(), saver.accounted.end());
+        host::drive::Recovery(layout(), *store).run();
+        for (const auto& entry : fs::recursive_directory_iterator(layout().home())) {
+            if (entry.is_regular_file())
+                accounted.insert(std::atoi(read(entry.path().string()).c_str()));
+        }
+        for (int version = 1; version <= saver.saved; ++version)
+            EXPECT_TRUE(accounted.contains(version)) << version << " of " << saver.saved << " is lost";
+    }
+    const std::shared_ptr<WindowStore> store = std::make_shared<WindowStore>(layout());
+    LocalItemChanges changes{layout(), store};
+};
+
+TEST_F(RaceTest, NoVersionIsDeletedThatTheDeleterHadNotSeen)
+{
+    constexpr int rounds = 200;
+    const auto item = url("a.txt");
+    promiseBeside("a.txt");
+    Saver saver(item.path(), folder().at("temporary"));
+    saver.start();
+    std::set<int> deleted;
+    for (int round = 0; round < rounds;) {
+        // In every other round a save is sure to come between the look and the deed.
+        const int before = saver.saved;
+        const bool isSaveAwaited = round % 2 == 0;
+        store->inTheWindow = [&] {
+            while (isSaveAwaited && saver.saved == before)
+                std::this_thread::yield();
+        };
+        const auto version = changes.versionOfItem(item.path());
+        const FileDescriptor seen(::open(item.path().c_str(), O_RDONLY | O_CLOEXEC));
+        struct stat status { };
+        if (!version || ::fstat(seen.get(), &status) != 0 || host::drive::versionOf(status) != *version)
+            continue;
+        ++round;
+        if (!changes.removeItem(item.path(), version)) {
+            char text[16] = {};
+            ASSERT_GT(::pread(seen.get(), text, sizeof text - 1, 0), 0);
+            deleted.insert(std::atoi(text));
+        }
+    }
+    saver.stop();
+    expectNoneLost(saver, deleted);
+    EXPECT_GT(saver.saved, rounds / 2);
+}
+
+TEST_F(RaceTest, NoVersionIsReplacedThatWasNotRead)
+{
+    constexpr int rounds = 300;
+    const auto item = url("a.txt");
+    Saver saver(item.path(), folder().at("temporary"));
+    saver.start();
+    std::set<int> accounted;
+    int replaced = 0;
+    for (int round = 0; round < rounds; ++round) {
+        // A saver that never rests is always faster than one who reads first.
+        saver.isResting = round % 2 == 0;
+        const auto before = changes.contentToReplace(item.path(), 100);
+        if (before && changes.replaceContent(item.path(), *before, "0")) {
+            accounted.insert(std::atoi(before->bytes->c_str()));
+            ++replaced;
+        }
+    }
+    saver.stop();
+    expectNoneLost(saver, accounted);
+    EXPECT_GT(replaced, 0);
+    EXPECT_GT(saver.saved, 1);
+}
+
+TEST_F(RaceTest, AFolderSwappedForALinkNeverLeadsOutside)
+{
+    constexpr int rounds = 600;
+    const auto outside = folder().at("outside");
+    const auto precious = folder().write("outside/a.txt", "precious");
+    makeFolder("from");
+    const auto target = makeFolder("to");
+    const auto from = url("from").path(), link = url("link").path();
+    fs::create_directory_symlink(outside, link);
+    promiseBeside("from/a.txt");
+    std::atomic<bool> isOver = false;
+    std::atomic<int> swaps = 0;
+    const auto swap = [&] {
+        if (::renameat2(AT_FDCWD, from.c_str(), AT_FDCWD, link.c_str(), RENAME_EXCHANGE) == 0)
+            ++swaps;
+    };
+    std::thread swapping([&] {
+        while (!isOver)
+            swap();
+    });
+    store->inTheWindow = [&] {
+        const int before = swaps;
+        while (swaps == before)
+            std::this_thread::yield();
+    };
+    int done = 0;
+    for (int round = 0; round < rounds; ++round) {
+        const bool isMove = round % 2 == 0;
+        const auto inside = fs::is_symlink(fs::symlink_status(from)) ? link : from;
+        // Lands in the folder or, when it was swapped just now, outside under the name that is there anyway.
+        const FileDescriptor folder(::open(inside.c_str(), O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
+        if (folder) {
+            const FileDescriptor file(::openat(folder.get(), "a.txt", O_WRONLY | O_CREAT | O_CLOEXEC, 0600));
+        }
+        const auto moved = target.path() + "/moved" + std::to_string(round);
+        const auto error =
+            isMove ? changes.moveItem(from + "/a.txt", moved) : changes.removeItem(from + "/a.txt", {});
+        done += error ? 0 : 1;
+        ASSERT_EQ(read(precious), "precious") << "round " << round;
+        changes.moveItem(target.path(), from + "/into");
+        changes.moveItem(from + "/into", target.path());
+    }
+    isOver = true;
+    swapping.join();
+    EXPECT_EQ(std::distance(fs::directory_iterator(outside), fs::directory_iterator()), 1);
+    EXPECT_GT(done, 0);
+    EXPECT_GT(swaps, rounds);
+}
+
+} // namespace

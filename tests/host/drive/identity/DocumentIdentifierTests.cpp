@@ -1,0 +1,420 @@
+#include "host/drive/identity/LocalDocumentIdentifiers.h"
+#include "host/drive/records/ItemFacts.h"
+#include "tests/support/DriveFixture.h"
+
+#include <gtest/gtest.h>
+#include <sqlite3.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <csignal>
+#include <filesystem>
+#include <fstream>
+#include <random>
+#include <set>
+
+namespace {
+
+using host::drive::DocumentIndex;
+using host::drive::LocalDocumentIdentifiers;
+using platform::Url;
+using testing_support::DriveFixture;
+using Kind = DocumentIndex::Answer::Kind;
+namespace fs = std::filesystem;
+
+std::optional<Url> find(platform::DocumentIdentifiers& identifiers, std::uint32_t identifier)
+{
+    const auto file = identifiers.resolve(identifier);
+    if (!file)
+        return std::nullopt;
+    const auto open = identifiers.open(*file);
+    if (!open)
+        return std::nullopt;
+    const auto found = (*open)->attributes();
+    return found && found->documentIdentifier == identifier ? std::optional(found->url) : std::nullopt;
+}
+
+class DocumentIdentifierTests : public testing::Test {
+protected:
+    platform::DocumentIdentifiers& identifiers() { return _drive.cloud->documentIdentifiers(); }
+    std::uint32_t identify(const Url& url)
+    {
+        const auto identifier = identifiers().identify(url);
+        EXPECT_TRUE(identifier) << url.path();
+        return identifier.value.value_or(0);
+    }
+    std::optional<Url> find(std::uint32_t identifier) { return ::find(identifiers(), identifier); }
+    Url document(const std::string& path = "Documents/a.txt") { return _drive.writeDocument(path, path); }
+    std::string indexedPath(std::uint32_t identifier) const
+    {
+        return DocumentIndex(_drive.layout().index()).lookUp(identifier).place.path;
+    }
+    void move(const std::string& from, const std::string& to)
+    {
+        ASSERT_EQ(_drive.cloud->itemChanges()->moveItem(at(from), at(to)), std::nullopt);
+    }
+    void remove(const std::string& path)
+    {
+        ASSERT_EQ(_drive.cloud->itemChanges()->removeItem(at(path), std::nullopt), std::nullopt);
+    }
+    void evict(const std::string& path)
+    {
+        ASSERT_EQ(_drive.cloud->items().evictItem(_drive.url(path)), std::nullopt);
+    }
+    void moveByOthers(const std::string& from, const std::string& to) { fs::rename(at(from), at(to)); }
+    /// Another file with the attributes of the first, as a copying program makes it.
+    void copyByOthers(const std::string& from, const std::string& to)
+    {
+        const auto identifier = host::drive::documentIdentifierAt(at(from));
+        fs::copy_file(at(from), at(to));
+        _drive.mark(_drive.url(to), host::drive::itemMark::documentIdentifier, std::to_string(identifier));
+    }
+    std::string at(const std::string& path) const { return _drive.url(path).path(); }
+
+    DriveFixture _drive;
+};
+
+TEST_F(DocumentIdentifierTests, anIdentifierIsGivenOnceAndToOneItem)
+{
+    host::drive::PromiseRecord promise;
+    promise.size = 12;
+    promise.tags = {"Red"};
+    _drive.writeLink("way", "Documents");
+    const Url items[] = {document(), document("Documents/\xff.txt"),
+        _drive.makeFolder("Documents/Album.album"), _drive.writePromise("Documents/promised.txt", promise)};
+    std::set<std::uint32_t> given;
+    for (const auto& item : items) {
+        const auto identifier = identify(item);
+        EXPECT_TRUE(given.insert(identifier).second);
+        EXPECT_EQ(identify(item), identifier) << item.path();
+        EXPECT_EQ(find(identifier), item);
+    }
+    EXPECT_EQ(identify(_drive.url("way/a.txt")), identify(items[0]));
+    EXPECT_FALSE(fs::exists(items[3].path()));
+    EXPECT_EQ(_drive.cloud->promisedItems().tagNames(items[3]).value, promise.tags) << "kept";
+
+    _drive.writeLink("link", "Documents/a.txt");
+    const auto outside = _drive.folder().write("outside.txt", "");
+    for (const auto& url : {_drive.url("link"), _drive.url("missing"), Url::fileURL(outside),
+             _drive.layout().documentsURL(), *Url::parse("https://example.org/a")})
+        EXPECT_TRUE(identifiers().identify(url).error) << url.path();
+    EXPECT_EQ(host::drive::documentIdentifierAt(outside), 0U);
+}
+
+TEST_F(DocumentIdentifierTests, aDocumentIsFoundWhereverItWent)
+{
+    const struct {
+        const char* name;
+        std::function<void()> happening;
+        const char* place;
+    } rows[] = {
+        {"renamed", [&] { move("F/a.txt", "F/b.txt"); }, "F/b.txt"},
+        {"moved with its folder", [&] { move("F", "Desktop/G"); }, "Desktop/G/a.txt"},
+        {"evicted", [&] { evict("F/a.txt"); }, "F/a.txt"},
+        {"evicted and moved", [&] { evict("F/a.txt"), move("F/a.txt", "b.txt"); }, "b.txt"},
+        {"renamed by others", [&] { moveByOthers("F/a.txt", "F/b.txt"); }, "F/b.txt"},
+        {"moved by others", [&] { moveByOthers("F/a.txt", "Desktop/b.txt"); }, "Desktop/b.txt"},
+        {"moved with its folder by others", [&] { moveByOthers("F", "Desktop/G"); }, "Desktop/G/a.txt"},
+        {"moved by others, another one in its place",
+            [&] { moveByOthers("F/a.txt", "b.txt"), document("F/a.txt"); }, "b.txt"},
+        {"moved by others, a copy in its place",
+            [&] { moveByOthers("F/a.txt", "b.txt"), copyByOthers("b.txt", "F/a.txt"); }, "b.txt"},
+        {"moved by others out of a folder that is then removed",
+            [&] { moveByOthers("F/a.txt", "b.txt"), remove("F"); }, "b.txt"},
+        {"saved by replacing it", [&] { copyByOthers("F/a.txt", "F/tmp"), moveByOthers("F/tmp", "F/a.txt"); },
+            "F/a.txt"},
+        {"moved to another disk and back",
+            [&] { copyByOthers("F/a.txt", "b.txt"), fs::remove(at("F/a.txt")); }, "b.txt"},
+        {"promise moved by others",
+            [&] { evict("F/a.txt"), moveByOthers("F/.a.txt.trwpromise", ".b.txt.trwpromise"); }, "b.txt"},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        const auto identifier = identify(document("F/a.txt"));
+        row.happening();
+        EXPECT_EQ(find(identifier), _drive.url(row.place));
+        _drive.settle();
+        EXPECT_EQ(indexedPath(identifier), "documents/BrindleDefault/" + std::string(row.place));
+        for (const char* rest : {"F", "Desktop/G", "b.txt", ".b.txt.trwpromise", "Desktop/b.txt"})
+            fs::remove_all(at(rest));
+    }
+}
+
+TEST_F(DocumentIdentifierTests, whatIsGoneIsNotFound)
+{
+    const struct {
+        const char* name;
+        std::function<void()> happening;
+    } rows[] = {
+        {"removed", [&] { remove("F/a.txt"); }},
+        {"removed with its folder", [&] { remove("F"); }},
+        {"removed, a copy left", [&] { copyByOthers("F/a.txt", "b.txt"), remove("F/a.txt"); }},
+        {"removed by others", [&] { fs::remove(at("F/a.txt")); }},
+        {"removed by others, another one in its place",
+            [&] { fs::remove(at("F/a.txt")), document("F/a.txt"); }},
+        {"moved out of the drive", [&] { fs::rename(at("F/a.txt"), _drive.folder().at("out.txt")); }},
+        {"moved out of the drive, a link to it in its place",
+            [&] {
+                fs::rename(at("F/a.txt"), _drive.folder().at("out.txt"));
+                _drive.writeLink("F/a.txt", _drive.folder().at("out.txt"));
+            }},
+        {"another file by its inode",
+            [&] { _drive.mark(_drive.url("F/a.txt"), host::drive::itemMark::documentIdentifier, "7"); }},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        const auto identifier = identify(document("F/a.txt"));
+        row.happening();
+        EXPECT_EQ(find(identifier), std::nullopt);
+        _drive.settle();
+        EXPECT_EQ(find(identifier), std::nullopt);
+        for (const char* rest : {"F", "b.txt"})
+            fs::remove_all(at(rest));
+    }
+    EXPECT_EQ(find(0), std::nullopt);
+}
+
+TEST_F(DocumentIdentifierTests, aCopyGetsAnIdentifierOfItsOwn)
+{
+    const struct {
+        const char* name;
+        std::function<void()> happening;
+        const char *original, *copy;
+    } rows[] = {
+        {"beside it", [&] { copyByOthers("F/a.txt", "F/b.txt"); }, "F/a.txt", "F/b.txt"},
+        {"the original moved by others",
+            [&] { copyByOthers("F/a.txt", "F/b.txt"), moveByOthers("F/a.txt", "c.txt"); }, "c.txt",
+            "F/b.txt"},
+        {"in its place", [&] { moveByOthers("F/a.txt", "c.txt"), copyByOthers("c.txt", "F/a.txt"); }, "c.txt",
+            "F/a.txt"},
+        {"the original evicted", [&] { copyByOthers("F/a.txt", "F/b.txt"), evict("F/a.txt"); }, "F/a.txt",
+            "F/b.txt"},
+        {"the index lost",
+            [&] {
+                copyByOthers("F/a.txt", "F/b.txt");
+                for (const char* suffix : {"", "-wal", "-shm"})
+                    fs::remove(_drive.layout().index() + suffix);
+            },
+            "F/a.txt", "F/b.txt"},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        const auto identifier = identify(document("F/a.txt"));
+        row.happening();
+        const auto copys = identify(_drive.url(row.copy));
+        EXPECT_NE(copys, identifier);
+        EXPECT_EQ(find(identifier), _drive.url(row.original));
+        EXPECT_EQ(find(copys), _drive.url(row.copy));
+        EXPECT_EQ(identify(_drive.url(row.original)), identifier);
+        fs::remove_all(at("F"));
+        fs::remove(at("c.txt"));
+    }
+    const auto identifier = identify(document("F/a.txt"));
+    copyByOthers("F/a.txt", "F/b.txt");
+    remove("F/a.txt");
+    EXPECT_NE(identify(_drive.url("F/b.txt")), identifier)
+        << "the number of a removed document stays its own";
+}
+
+TEST_F(DocumentIdentifierTests, aRowThatIsReadCorrectsTheIndex)
+{
+    const auto identifier = identify(document());
+    moveByOthers("Documents/a.txt", "Desktop/b.txt");
+    const auto read = [&](const char* path) {
+        _drive.cloud->promisedItems().readItem(_drive.url(path), {});
+        _drive.settle();
+    };
+    read("Desktop/b.txt");
+    EXPECT_EQ(indexedPath(identifier), "documents/BrindleDefault/Desktop/b.txt");
+    copyByOthers("Desktop/b.txt", "Desktop/copy.txt");
+    read("Desktop/copy.txt");
+    EXPECT_EQ(indexedPath(identifier), "documents/BrindleDefault/Desktop/b.txt")
+        << "a copy is not the document";
+    remove("Desktop/b.txt");
+    read("Desktop/copy.txt");
+    EXPECT_EQ(find(identifier), std::nullopt);
+}
+
+TEST_F(DocumentIdentifierTests, aDeepSearchEndsInTheBackground)
+{
+    const auto identifier = identify(document());
+    for (int i = 0; i < 11'000; ++i)
+        std::ofstream(at("Documents/" + std::to_string(i)));
+    _drive.makeFolder("Documents/z");
+    moveByOthers("Documents/a.txt", "Documents/z/a.txt");
+    EXPECT_EQ(find(identifier), std::nullopt) << "the main thread does not look at everything";
+    _drive.settle();
+    EXPECT_EQ(find(identifier), _drive.url("Documents/z/a.txt"));
+}
+
+TEST_F(DocumentIdentifierTests, aLinkInPlaceOfTheFolderIsNotFollowed)
+{
+    const auto identifier = identify(document("F/a.txt"));
+    moveByOthers("F", "G");
+    _drive.writeLink("F", "G");
+    EXPECT_EQ(find(identifier), std::nullopt);
+    _drive.settle();
+    EXPECT_EQ(find(identifier), _drive.url("G/a.txt"));
+}
+
+class DamagedIndexTests : public DocumentIdentifierTests {
+protected:
+    void SetUp() override
+    {
+        // Not by way of the drive's own service: its connection would live on beside the damage.
+        auto identifiers = LocalDocumentIdentifiers::create(_drive.layout(), _drive.dispatch);
+        for (int i = 0; i < 40; ++i)
+            _identifier = *identifiers->identify(document("F/" + std::to_string(i)));
+        _place = document("F/39");
+        identifiers.reset();
+        std::ifstream file(_drive.layout().index(), std::ios::binary);
+        _whole.assign(std::istreambuf_iterator<char>(file), {});
+        ASSERT_FALSE(fs::exists(_drive.layout().index() + "-wal")) << "all of it is in the file";
+        ASSERT_GT(_whole.size(), 8192U);
+    }
+    void writeIndex(const std::string& content)
+    {
+        for (const char* suffix : {"-wal", "-shm"})
+            fs::remove(_drive.layout().index() + suffix);
+        std::ofstream(_drive.layout().index(), std::ios::binary | std::ios::trunc) << content;
+    }
+    std::shared_ptr<LocalDocumentIdentifiers> begin() const
+    {
+        return LocalDocumentIdentifiers::create(_drive.layout(), _drive.dispatch);
+    }
+
+    std::uint32_t _identifier = 0;
+    Url _place = Url::fileURL("/");
+    std::string _whole;
+};
+
+TEST_F(DamagedIndexTests, cutOffAtAnyByte)
+{
+    for (std::size_t length = 0; length < _whole.size(); length += length < 4200 ? 1 : 61) {
+        writeIndex(_whole.substr(0, length));
+        const auto identifiers = begin();
+        ASSERT_EQ(::find(*identifiers, _identifier), _place) << length;
+        if (length % 256 != 0)
+            continue;
+        _drive.settle();
+        DocumentIndex index(_drive.layout().index());
+        ASSERT_EQ(index.state(), DocumentIndex::State::Complete) << length;
+        ASSERT_EQ(index.lookUp(_identifier).kind, Kind::Known) << length;
+    }
+}
+
+TEST_F(DamagedIndexTests, overwrittenWithGarbage)
+{
+    std::mt19937 random(20'021);
+    for (int round = 0; round < 400; ++round) {
+        auto content = _whole;
+        const auto begins = random() % content.size();
+        for (auto at = begins; at < std::min<std::size_t>(begins + 1 + random() % 600, content.size()); ++at)
+            content[at] = static_cast<char>(random());
+        writeIndex(content);
+        const auto identifiers = begin();
+        const auto found = ::find(*identifiers, _identifier);
+        EXPECT_TRUE(!found || *found == _place) << round << ' ' << found->path();
+        const auto identifier = identifiers->identify(_place);
+        EXPECT_TRUE(!identifier || ::find(*identifiers, *identifier) == _place) << round;
+        _drive.mark(_place, host::drive::itemMark::documentIdentifier, std::to_string(_identifier));
+        _drive.settle();
+    }
+    writeIndex(std::string(20'000, '\x5a'));
+    EXPECT_EQ(::find(*begin(), _identifier), _place);
+}
+
+TEST_F(DamagedIndexTests, replacedWhileItIsOpen)
+{
+    const auto identifiers = begin();
+    EXPECT_EQ(::find(*identifiers, _identifier), _place);
+    fs::remove(_drive.layout().index());
+    moveByOthers("F/39", "b.txt");
+    EXPECT_EQ(::find(*identifiers, _identifier), _drive.url("b.txt"));
+    _drive.settle();
+    EXPECT_EQ(::find(*begin(), _identifier), _drive.url("b.txt"));
+}
+
+TEST_F(DamagedIndexTests, lockedByAnotherProcess)
+{
+    sqlite3* other = nullptr;
+    ASSERT_EQ(sqlite3_open(_drive.layout().index().c_str(), &other), SQLITE_OK);
+    ASSERT_EQ(
+        sqlite3_exec(other, "PRAGMA locking_mode = EXCLUSIVE; BEGIN EXCLUSIVE", nullptr, nullptr, nullptr),
+        SQLITE_OK);
+    const auto identifiers = begin();
+    EXPECT_EQ(::find(*identifiers, _identifier), _place);
+    EXPECT_TRUE(identifiers->identify(document("new.txt")).error) << "nobody can tell which numbers are free";
+    sqlite3_close(other);
+    EXPECT_TRUE(identifiers->identify(document("new.txt")));
+    EXPECT_EQ(::find(*identifiers, _identifier), _place);
+}
+
+/// Runs a body in a process of its own, which is not told of its parent's end.
+template <typename Body>
+pid_t inChild(Body body)
+{
+    const pid_t child = ::fork();
+    if (child == 0) {
+        body();
+        ::_exit(0);
+    }
+    return child;
+}
+
+TEST_F(DocumentIdentifierTests, aWriterThatIsKilledLeavesWhatItHadNoted)
+{
+    for (int round = 1; round <= 8; ++round) {
+        int ends[2];
+        ASSERT_EQ(::pipe(ends), 0);
+        const pid_t child = inChild([&] {
+            DocumentIndex index(_drive.layout().index());
+            for (std::uint32_t i = 1;; ++i) {
+                if (index.note(i, {"documents/" + std::to_string(i), 1, i}))
+                    (void)!::write(ends[1], &i, sizeof i);
+            }
+        });
+        std::uint32_t noted = 0;
+        while (noted < static_cast<std::uint32_t>(40 * round))
+            ASSERT_EQ(::read(ends[0], &noted, sizeof noted), static_cast<ssize_t>(sizeof noted));
+        ::kill(child, SIGKILL);
+        ::waitpid(child, nullptr, 0);
+        ::close(ends[0]), ::close(ends[1]);
+        DocumentIndex index(_drive.layout().index());
+        for (std::uint32_t i = 1; i <= noted; ++i)
+            ASSERT_EQ(index.lookUp(i).place.path, "documents/" + std::to_string(i));
+    }
+}
+
+TEST_F(DocumentIdentifierTests, processesThatIdentifyOneCopyAgree)
+{
+    // The connection must be closed before the process is doubled.
+    const auto original = LocalDocumentIdentifiers::create(_drive.layout(), _drive.dispatch)
+                              ->identify(document("a.txt"))
+                              .value.value_or(0);
+    for (int round = 0; round < 10; ++round) {
+        copyByOthers("a.txt", "copy.txt");
+        int ends[2];
+        ASSERT_EQ(::pipe(ends), 0);
+        std::vector<pid_t> children;
+        for (int i = 0; i < 4; ++i)
+            children.push_back(inChild([&] {
+                const auto mine = LocalDocumentIdentifiers::create(_drive.layout(), _drive.dispatch);
+                const auto identifier = mine->identify(_drive.url("copy.txt")).value.value_or(0);
+                (void)!::write(ends[1], &identifier, sizeof identifier);
+            }));
+        std::set<std::uint32_t> answers;
+        for (const auto child : children) {
+            std::uint32_t answer = 0;
+            ASSERT_EQ(::read(ends[0], &answer, sizeof answer), static_cast<ssize_t>(sizeof answer));
+            answers.insert(answer);
+            ::waitpid(child, nullptr, 0);
+        }
+        ::close(ends[0]), ::close(ends[1]);
+        EXPECT_EQ(answers.size(), 1U);
+        EXPECT_FALSE(answers.contains(original) || answers.contains(0));
+        fs::remove(at("copy.txt"));
+    }
+}
+
+} // namespace

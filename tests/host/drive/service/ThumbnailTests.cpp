@@ -1,0 +1,90 @@
+#include "host/drive/sample/SamplePictures.h"
+#include "host/drive/service/ThumbnailCache.h"
+#include "tests/support/DriveFixture.h"
+
+#include <gtest/gtest.h>
+
+#include <sys/stat.h>
+
+#include <filesystem>
+#include <thread>
+
+namespace {
+
+using platform::AttributeKey;
+using platform::ThumbnailMap;
+using platform::Url;
+using testing_support::DriveFixture;
+
+class ThumbnailTests : public testing::Test {
+protected:
+    std::optional<ThumbnailMap> thumbnails(const Url& url)
+    {
+        constexpr AttributeKey keys[] = {AttributeKey::ThumbnailMap};
+        const auto values = _drive.cloud->promisedItems().promisedItemResourceValues(url, keys);
+        return values ? values->optional<ThumbnailMap>(AttributeKey::ThumbnailMap) : std::nullopt;
+    }
+    std::vector<std::filesystem::path> entries() const
+    {
+        std::vector<std::filesystem::path> found;
+        std::error_code none;
+        for (const auto& entry :
+            std::filesystem::directory_iterator(_drive.folder().at("thumbnails/xx-large"), none))
+            found.push_back(entry.path());
+        return found;
+    }
+
+    DriveFixture _drive;
+};
+
+TEST_F(ThumbnailTests, madeInTheBackgroundWhenTheMainThreadAsks)
+{
+    const auto picture =
+        _drive.writeDocument("Photos/hill & lake 100%.jpg", host::drive::sample::landscapeJpeg(1));
+    EXPECT_FALSE(thumbnails(picture)) << "the main thread does not wait for a picture to be decoded";
+    _drive.settle();
+    const auto made = thumbnails(picture);
+    ASSERT_TRUE(made);
+    ASSERT_EQ(made->size(), 1u);
+    EXPECT_EQ(made->front().pixelSize, 1024);
+    EXPECT_EQ(made->front().image.pixelWidth(), 1024);
+    EXPECT_EQ(made->front().image.pixelHeight(), 768);
+
+    ASSERT_EQ(entries().size(), 1u);
+    struct stat status { };
+    ASSERT_EQ(::stat(entries().front().c_str(), &status), 0);
+    EXPECT_EQ(status.st_mode & 0777, 0600u) << "thumbnails are private";
+
+    // Another version of the file: the old thumbnail no longer counts.
+    std::filesystem::last_write_time(
+        picture.path(), std::filesystem::last_write_time(picture.path()) - std::chrono::hours(1));
+    EXPECT_FALSE(thumbnails(picture));
+    _drive.settle();
+    EXPECT_TRUE(thumbnails(picture));
+    EXPECT_EQ(entries().size(), 1u);
+}
+
+TEST_F(ThumbnailTests, madeAtOnceForAThreadInTheBackground)
+{
+    const auto picture = _drive.writeDocument("small.png", host::drive::sample::portraitPng(0));
+    std::thread([&] {
+        const auto made = thumbnails(picture);
+        ASSERT_TRUE(made);
+        EXPECT_EQ(made->front().image.pixelWidth(), 900) << "a small picture is not made larger";
+    }).join();
+}
+
+TEST_F(ThumbnailTests, noneForWhatIsNoPicture)
+{
+    const Url urls[] = {_drive.writeDocument("notes.txt", "text"),
+        _drive.writeDocument("broken.png", "no picture"), _drive.makeFolder("folder.png"),
+        _drive.writePromise("promised.png", {}), _drive.writeLink("link.png", "/dev/zero")};
+    for (const auto& url : urls) {
+        EXPECT_FALSE(thumbnails(url)) << url.path();
+        _drive.settle();
+        EXPECT_FALSE(thumbnails(url)) << url.path();
+    }
+    EXPECT_TRUE(entries().empty());
+}
+
+} // namespace
