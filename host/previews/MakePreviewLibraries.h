@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/gtk/PreviewLibraries.h"
+#include "host/gtk/preview/PreviewLibraries.h"
 
 /// The one function of the module, found by this name (`host::gtk::makePreviewLibrariesName`).
 extern "C" void trwMakePreviewLibraries(std::shared_ptr<host::gtk::PreviewLibraries>& made);

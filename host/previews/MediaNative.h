@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/gtk/PreviewNative.h"
+#include "host/gtk/preview/PreviewNative.h"
 #include "screens/preview/PreviewMediaView.h"
 
 namespace host::previews {

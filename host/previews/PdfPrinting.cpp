@@ -1,6 +1,6 @@
 #include "host/previews/PdfPrinting.h"
 
-#include "host/gtk/ObjectRef.h"
+#include "host/gtk/base/ObjectRef.h"
 #include "host/system/texts/Translate.h"
 
 #include <poppler.h>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/gtk/PrintablePages.h"
+#include "host/gtk/preview/PrintablePages.h"
 
 namespace host::previews {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/gtk/ObjectRef.h"
+#include "host/gtk/base/ObjectRef.h"
 
 #include <gtksourceview/gtksource.h>
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/gtk/PreviewNative.h"
+#include "host/gtk/preview/PreviewNative.h"
 #include "screens/preview/PreviewTextView.h"
 
 #include <gtksourceview/gtksource.h>

@@ -1,0 +1,38 @@
+#pragma once
+
+#include "host/gtk/base/Theme.h"
+#include "kit/Canvas.h"
+
+#include <cairo.h>
+
+namespace host::gtk {
+
+/// What a view draws into while its widget is painted.
+class CairoCanvas : public platform::ui::Canvas {
+public:
+    CairoCanvas(cairo_t* cairo, const Theme& theme);
+
+    void setFillColor(const platform::Color& color) override { _fill = color; }
+    void setStrokeColor(const platform::Color& color) override { _stroke = color; }
+    void setLineWidth(double points) override;
+    void fillRect(const platform::Rect& rect) override;
+    void strokeRect(const platform::Rect& rect) override;
+    void fillEllipse(const platform::Rect& inscribedIn) override;
+    void strokeEllipse(const platform::Rect& inscribedIn) override;
+    void fillPie(const platform::ui::Pie& pie) override;
+    void strokeArc(const platform::ui::Pie& arc) override;
+    void drawImage(const platform::Image& image, const platform::Rect& rect) override;
+    void drawText(std::string_view text, const platform::ui::Font& font, platform::Point origin) override;
+
+private:
+    void fill();
+    void stroke();
+    void use(const platform::Color& color);
+    void ellipse(const platform::Rect& inscribedIn);
+
+    cairo_t* _cairo;
+    const Theme& _theme;
+    platform::Color _fill = platform::Color::black(), _stroke = platform::Color::black();
+};
+
+} // namespace host::gtk

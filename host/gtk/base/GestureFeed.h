@@ -1,0 +1,36 @@
+#pragma once
+
+#include "host/gtk/base/Signal.h"
+#include "platform/Geometry.h"
+
+#include <gtk/gtk.h>
+
+#include <functional>
+#include <memory>
+
+namespace platform::ui {
+class GestureRecognizer;
+class View;
+} // namespace platform::ui
+
+namespace host::gtk {
+
+/// Hands what one finger or the first mouse button does on a widget to the recognisers of a view.
+class GestureFeed {
+public:
+    GestureFeed(GtkWidget* widget, std::weak_ptr<platform::ui::View> view);
+    ~GestureFeed();
+
+private:
+    using Call = std::function<void(platform::ui::GestureRecognizer&)>;
+    void tell(const Call& call) const;
+    void dragged(double dx, double dy);
+
+    GtkWidget* _widget;
+    GtkGesture *_drag, *_rest;
+    std::weak_ptr<platform::ui::View> _view;
+    platform::Point _start, _last;
+    SignalConnections _connections;
+};
+
+} // namespace host::gtk

@@ -1,0 +1,31 @@
+#pragma once
+
+#include "host/gtk/base/Theme.h"
+#include "kit/TextMeasurer.h"
+
+#include <memory>
+
+namespace host::gtk {
+
+/// Measures texts with the fonts that the labels are shown in.
+class PangoTextMeasurer : public platform::ui::TextMeasurer {
+public:
+    explicit PangoTextMeasurer(std::shared_ptr<const Theme> theme);
+
+    platform::Size measure(std::string_view text, const platform::ui::Font& font,
+        const platform::ui::TextLimits& limits) const override;
+    platform::Size measure(const platform::ui::AttributedText& text, const platform::ui::Font& font,
+        const platform::ui::TextLimits& limits) const override;
+    platform::ui::FontMetrics metrics(const platform::ui::Font& font) const override;
+
+    /// The theme's fonts or its window have changed.
+    void themeDidChange();
+
+private:
+    PangoContext* context() const;
+
+    std::shared_ptr<const Theme> _theme;
+    mutable ObjectRef<PangoContext> _context;
+};
+
+} // namespace host::gtk

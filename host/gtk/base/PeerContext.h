@@ -1,0 +1,65 @@
+#pragma once
+
+#include "host/gtk/base/FirstList.h"
+#include "host/gtk/base/FrameScheduler.h"
+#include "host/gtk/base/ObjectRef.h"
+#include "host/gtk/base/Theme.h"
+
+#include <gtk/gtk.h>
+
+#include <functional>
+#include <map>
+#include <memory>
+#include <string>
+#include <unordered_map>
+
+namespace platform::ui {
+class BarButtonItem;
+class HostedView;
+class View;
+} // namespace platform::ui
+
+namespace host::gtk {
+
+class ViewPeer;
+
+/// Makes the native widget of a hosted view and keeps it in step: called for each change of the settings with
+/// the widget of the call before, null at first.
+using HostedViewMaker =
+    std::function<ObjectRef<GtkWidget>(platform::ui::HostedView& view, GtkWidget* current)>;
+
+/// What the peers of one window share: its theme, its frames, and who shows what. Main thread only.
+class PeerContext {
+public:
+    PeerContext(std::shared_ptr<Theme> theme, std::shared_ptr<FrameScheduler> scheduler);
+
+    Theme& theme() const { return *_theme; }
+    FrameScheduler& scheduler() const { return *_scheduler; }
+    FirstList& firstList() { return _firstList; }
+
+    void add(const platform::ui::View& view, ViewPeer& peer);
+    void remove(const platform::ui::View& view, const ViewPeer& peer);
+    /// The peer that shows a view; null: none.
+    ViewPeer* peerOf(const platform::ui::View& view) const;
+
+    void setWidget(const platform::ui::BarButtonItem& item, GtkWidget* widget);
+    void removeWidget(const platform::ui::BarButtonItem& item, const GtkWidget* widget);
+    /// The widget that shows an entry of a bar; null: none.
+    GtkWidget* widgetOf(const platform::ui::BarButtonItem& item) const;
+
+    void setHostedViewMaker(const std::string& kind, HostedViewMaker maker);
+    const HostedViewMaker* hostedViewMaker(const std::string& kind) const;
+
+    /// Colours and fonts have changed: every peer shows itself anew.
+    void themeDidChange();
+
+private:
+    std::shared_ptr<Theme> _theme;
+    std::shared_ptr<FrameScheduler> _scheduler;
+    FirstList _firstList;
+    std::unordered_map<const platform::ui::View*, ViewPeer*> _peers;
+    std::unordered_map<const platform::ui::BarButtonItem*, GtkWidget*> _itemWidgets;
+    std::map<std::string, HostedViewMaker> _makers;
+};
+
+} // namespace host::gtk

@@ -1,0 +1,100 @@
+#pragma once
+
+#include "host/gtk/base/CanvasWidget.h"
+#include "host/gtk/base/ObjectRef.h"
+#include "host/gtk/base/PeerContext.h"
+#include "kit/View.h"
+
+#include <functional>
+#include <memory>
+#include <vector>
+
+namespace host::gtk {
+
+class GestureFeed;
+
+/// Shows one view of the kit: a canvas widget that paints the view's style and drawing, holds the native
+/// widget of the view's kind if it has one, and places the subviews' peers at the frames of the model.
+/// Changes are mirrored once a frame. It knows its view weakly, and the view knows it weakly. Main thread
+/// only.
+class ViewPeer : public platform::ui::ViewObserver,
+                 public CanvasClient,
+                 public std::enable_shared_from_this<ViewPeer> {
+public:
+    ViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::View>& view,
+        GtkAccessibleRole role = GTK_ACCESSIBLE_ROLE_GROUP);
+    ~ViewPeer() override;
+    ViewPeer(const ViewPeer&) = delete;
+    ViewPeer& operator=(const ViewPeer&) = delete;
+
+    /// Observes the view and shows all of it, with its subviews. To be called once, right after it was made.
+    void start();
+
+    GtkWidget* widget() const { return _canvas.get(); }
+    GtkWidget* native() const { return _native.get(); } ///< null: this kind has none
+    std::shared_ptr<platform::ui::View> view() const { return _view.lock(); }
+    const std::vector<std::shared_ptr<ViewPeer>>& children() const { return _children; }
+
+    /// Makes this the root of a place in the toolkit's own layout: `onResize` is told the size that the place
+    /// has and brings it to the model, `fit` answers what the place should ask for (null: nothing).
+    using ResizeHandler = std::function<void(platform::Size)>;
+    using FittingSize = std::function<platform::Size(double forWidth)>;
+    void setRoot(ResizeHandler onResize, FittingSize fit = {});
+
+    /// Everything is mirrored again in the next frame.
+    void showAnew();
+    /// Moves the keyboard focus here. False: the view does not take it.
+    virtual bool grabFocus();
+
+    void viewDidChange(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+    void viewWantsFocus(platform::ui::View& view, bool focus) override;
+
+    platform::Size canvasNaturalSize(double forWidth) override;
+    void canvasAllocate(int width, int height) override;
+    void canvasSnapshot(GtkSnapshot* snapshot) override;
+    bool canvasContains(double x, double y) override;
+
+protected:
+    PeerContext& context() const { return *_context; }
+    const std::shared_ptr<PeerContext>& sharedContext() const { return _context; }
+    void setNative(GtkWidget* native);
+    /// What tells assistive technology of the view.
+    virtual GtkWidget* spoken() const { return _native ? _native.get() : _canvas.get(); }
+    /// Where the subviews' widgets go, and how far their frames are moved there.
+    virtual GtkWidget* childContainer() const { return _canvas.get(); }
+    virtual platform::Point childOrigin() const;
+    /// Brings changes of the model to the widgets.
+    virtual void mirror(platform::ui::View& view, platform::ui::ViewChanges changes);
+    void allocateChildren();
+    void connect(SignalConnection connection) { _connections.push_back(std::move(connection)); }
+
+private:
+    void mirrorPending();
+    void mirrorSubviews(const platform::ui::View& view);
+    void mirrorAccessibility(const platform::ui::View& view);
+    void mirrorGestures(const platform::ui::View& view);
+    void dropFocus();
+    void queueAllocateInParent() const;
+    void snapshotBackground(
+        const platform::ui::View& view, GtkSnapshot* snapshot, const GskRoundedRect& shape);
+    void snapshotBorder(const platform::ui::View& view, GtkSnapshot* snapshot, const GskRoundedRect& shape);
+    void snapshotDrawing(const platform::ui::View& view, GtkSnapshot* snapshot);
+
+    std::shared_ptr<PeerContext> _context;
+    std::weak_ptr<platform::ui::View> _view;
+    const platform::ui::View* _key;
+    ObjectRef<GtkWidget> _canvas, _native;
+    std::vector<std::shared_ptr<ViewPeer>> _children;
+    platform::ui::ViewChanges _pending;
+    ResizeHandler _onResize;
+    FittingSize _fit;
+    platform::Size _allocated{-1, -1};
+    std::unique_ptr<GestureFeed> _gestures;
+    SignalConnections _connections;
+};
+
+/// Makes the peer of a view by the view's kind, started.
+std::shared_ptr<ViewPeer> makePeer(
+    const std::shared_ptr<PeerContext>& context, const std::shared_ptr<platform::ui::View>& view);
+
+} // namespace host::gtk

@@ -1,0 +1,60 @@
+#pragma once
+
+#include "host/gtk/preview/PreviewNative.h"
+#include "host/gtk/preview/ZoomScroller.h"
+#include "screens/preview/PreviewPagesView.h"
+
+#include <map>
+
+namespace host::gtk {
+
+/// Shows a document's pages one below the other, with what is found and what is selected in them.
+class PagesNative : public PreviewNative, private ZoomContent {
+public:
+    explicit PagesNative(const std::shared_ptr<platform::components::PreviewPagesView>& view);
+
+    GtkWidget* widget() const override { return _scroller.widget(); }
+    void start() override;
+    ZoomScroller& scroller() { return _scroller; }
+
+    void previewContentDidChange() override;
+    void previewNeedsDisplay() override;
+    void previewZoomDidChange() override;
+    void previewShouldScrollTo(const platform::Rect& content) override;
+    void previewShouldTakeFocus() override;
+    void previewShouldCopy() override;
+
+private:
+    using View = platform::components::PreviewPagesView;
+    struct Shown {
+        platform::Image picture;
+        ObjectRef<GdkPaintable> texture;
+    };
+
+    platform::Size baseSize(platform::Size window) override;
+    void draw(GtkSnapshot* snapshot, const platform::Rect& visible) override;
+    void zoomed(double zoom) override;
+    void sees(const platform::Rect& visible) override;
+
+    void drawPage(GtkSnapshot* snapshot, const View& view, std::size_t page);
+    void drawPicture(
+        GtkSnapshot* snapshot, std::size_t key, const platform::Image& picture, const platform::Rect& place);
+    void drawMarks(GtkSnapshot* snapshot, const View& view, std::size_t page);
+    void drawBroken(GtkSnapshot* snapshot, const platform::Rect& frame);
+    void drawFields(GtkSnapshot* snapshot, const View& view, std::size_t page);
+    void addSelection();
+    void addTap();
+    void addKeys();
+    void addUndo();
+    bool pressed(guint key, bool withControl);
+    void updateLabel();
+
+    std::weak_ptr<View> _view;
+    std::map<std::size_t, Shown> _shown; ///< textures, so that a picture is not handed over every frame
+    platform::Point _selectionStart, _pressed; ///< in the content; in the window
+    bool _isHolding = false; ///< a finger that was held selects
+    ZoomScroller _scroller;
+    SignalConnections _connections;
+};
+
+} // namespace host::gtk

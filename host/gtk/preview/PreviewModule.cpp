@@ -1,0 +1,118 @@
+#include "host/gtk/preview/PreviewModule.h"
+
+#include "host/system/texts/Translate.h"
+#include "platform/Dispatch.h"
+#include "platform/Log.h"
+#include "platform/Services.h"
+
+#include <dlfcn.h>
+
+#include <cerrno>
+#include <utility>
+
+namespace host::gtk {
+
+namespace {
+
+/// All of its references are looked up at once: one that is missing makes it a module that is missing, not a
+/// process that ends later. It stays for good, because the types that it registers do.
+PreviewModule::Libraries loadFile(const std::string& path)
+{
+    static constexpr platform::Operation op{"PreviewModule::loadFile"};
+    auto* module = ::dlopen(path.c_str(), RTLD_NOW | RTLD_LOCAL | RTLD_NODELETE);
+    auto* make =
+        module ? reinterpret_cast<MakePreviewLibraries*>(::dlsym(module, makePreviewLibrariesName)) : nullptr;
+    std::shared_ptr<PreviewLibraries> made;
+    if (make)
+        make(made);
+    else
+        op.error("The module of the previews cannot be loaded: %s", std::string(::dlerror()));
+    return made;
+}
+
+} // namespace
+
+PreviewModule::PreviewModule(std::function<Libraries()> load)
+    : _load(std::move(load))
+{
+}
+
+std::shared_ptr<PreviewModule> PreviewModule::inFile(const std::string& path)
+{
+    return std::make_shared<PreviewModule>([path] { return loadFile(path); });
+}
+
+PreviewModule::Libraries PreviewModule::load() const
+{
+    std::call_once(_once, [this] {
+        _libraries = std::exchange(_load, {})();
+        _isLoaded = true;
+    });
+    return _libraries;
+}
+
+void PreviewModule::whenLoaded(Answer answer)
+{
+    if (_isLoaded && _libraries) {
+        answer(_libraries);
+        return;
+    }
+    _waiting.push_back(std::move(answer));
+    if (!_queue)
+        loadOnWorker();
+}
+
+void PreviewModule::loadOnWorker()
+{
+    auto& dispatch = platform::services().dispatch();
+    _queue = dispatch.makeSerialQueue("preview libraries");
+    _queue->async([weak = weak_from_this(), main = dispatch.mainQueue()] {
+        if (const auto self = weak.lock())
+            self->load();
+        main->async([weak] {
+            if (const auto self = weak.lock())
+                self->answerAll();
+        });
+    });
+}
+
+void PreviewModule::answerAll()
+{
+    _queue.reset();
+    for (const auto& answer : std::exchange(_waiting, {}))
+        answer(_libraries);
+}
+
+platform::Result<std::shared_ptr<platform::PagedDocument>> PreviewModule::open(const std::string& path) const
+{
+    if (const auto libraries = load())
+        return libraries->pagedDocuments().open(path);
+    return missingError();
+}
+
+platform::Result<std::shared_ptr<platform::PagedDocumentEditing>> PreviewModule::openForEditing(
+    std::shared_ptr<const std::string> bytes) const
+{
+    if (const auto libraries = load())
+        return libraries->pagedDocuments().openForEditing(std::move(bytes));
+    return missingError();
+}
+
+std::optional<std::string> PreviewModule::decode(std::string_view bytes, platform::TextEnd end) const
+{
+    const auto libraries = load();
+    return libraries ? libraries->textDecoder().decode(bytes, end) : std::nullopt;
+}
+
+std::string PreviewModule::missingWords()
+{
+    return system::translated("The part of the program that shows such documents is missing.");
+}
+
+platform::Error PreviewModule::missingError()
+{
+    return {platform::errorDomain::system, ENOSYS,
+        {{std::string(platform::errorKey::localizedDescription), missingWords()}}};
+}
+
+} // namespace host::gtk

@@ -1,0 +1,125 @@
+#include "host/gtk/preview/PreviewNative.h"
+
+#include "host/gtk/preview/PagesNative.h"
+#include "host/gtk/preview/PictureNative.h"
+#include "host/gtk/preview/PreviewModule.h"
+#include "screens/preview/PreviewMediaView.h"
+#include "screens/preview/PreviewTextView.h"
+
+#include <adwaita.h>
+
+#include <functional>
+
+namespace host::gtk {
+
+namespace components = platform::components;
+namespace ui = platform::ui;
+using components::PreviewView;
+
+namespace {
+
+constexpr const char* nativeKey = "trw-preview-native";
+
+using Native = std::shared_ptr<PreviewNative>;
+
+void show(GtkWidget* holder, PreviewView& view, const Native& native)
+{
+    native->start();
+    view.setPreviewObserver(native);
+    adw_bin_set_child(ADW_BIN(holder), native->widget());
+    // The native view keeps its widgets, their holder keeps it.
+    g_object_set_data_full(G_OBJECT(holder), nativeKey, std::make_unique<Native>(native).release(),
+        [](gpointer held) { delete static_cast<Native*>(held); });
+}
+
+/// `fill` puts the native view of a new view into its holder, now or later.
+template <typename View, typename Fill>
+void addMaker(PeerContext& context, Fill fill)
+{
+    context.setHostedViewMaker(
+        View::kindName, [fill](ui::HostedView& hosted, GtkWidget* current) -> ObjectRef<GtkWidget> {
+            if (current)
+                return ObjectRef<GtkWidget>::retain(current);
+            auto holder = ObjectRef<GtkWidget>::retain(adw_bin_new());
+            // The kind says what the view is.
+            fill(holder, std::static_pointer_cast<View>(hosted.shared_from_this()));
+            return holder;
+        });
+}
+
+template <typename View, typename Made>
+void addOwnMaker(PeerContext& context)
+{
+    addMaker<View>(context, [](const ObjectRef<GtkWidget>& holder, const std::shared_ptr<View>& view) {
+        show(holder.get(), *view, std::make_shared<Made>(view));
+    });
+}
+
+template <typename View>
+void addModuleMaker(PeerContext& context, const std::shared_ptr<PreviewModule>& previews,
+    Native (PreviewLibraries::*make)(const std::shared_ptr<View>&) const)
+{
+    addMaker<View>(
+        context, [previews, make](const ObjectRef<GtkWidget>& holder, const std::shared_ptr<View>& view) {
+            previews->whenLoaded([holder, make, weak = std::weak_ptr(view)](const auto& libraries) {
+                const auto shown = weak.lock();
+                if (shown && libraries)
+                    show(holder.get(), *shown, ((*libraries).*make)(shown));
+                else if (shown)
+                    shown->nativeFailed(PreviewModule::missingWords());
+            });
+        });
+}
+
+using Command = std::function<void(PreviewView&)>;
+
+void addShortcut(GtkEventController* controller, const std::weak_ptr<PreviewView>& view, const char* trigger,
+    const Command& command)
+{
+    struct Target {
+        std::weak_ptr<PreviewView> view;
+        Command command;
+    };
+    const auto call = [](GtkWidget* shown, GVariant*, gpointer data) -> gboolean {
+        const auto* target = static_cast<Target*>(data);
+        const auto seen = gtk_widget_get_mapped(shown) ? target->view.lock() : nullptr;
+        if (seen)
+            target->command(*seen);
+        return seen ? TRUE : FALSE;
+    };
+    auto* action = gtk_callback_action_new(call, std::make_unique<Target>(Target{view, command}).release(),
+        [](gpointer data) { delete static_cast<Target*>(data); });
+    gtk_shortcut_controller_add_shortcut(GTK_SHORTCUT_CONTROLLER(controller),
+        gtk_shortcut_new(gtk_shortcut_trigger_parse_string(trigger), action));
+}
+
+} // namespace
+
+void PreviewNative::addShortcuts(GtkWidget* widget, const std::weak_ptr<PreviewView>& view)
+{
+    auto* controller = gtk_shortcut_controller_new();
+    gtk_shortcut_controller_set_scope(GTK_SHORTCUT_CONTROLLER(controller), GTK_SHORTCUT_SCOPE_GLOBAL);
+    const auto add = [&](const char* trigger, const Command& command) {
+        addShortcut(controller, view, trigger, command);
+    };
+    add("<Control>f", [](PreviewView& shown) { shown.userWantsToFind(); });
+    add("<Control>plus|<Control>equal|<Control>KP_Add",
+        [](PreviewView& shown) { shown.setZoom(shown.zoom() * PreviewView::zoomStep); });
+    add("<Control>minus|<Control>KP_Subtract",
+        [](PreviewView& shown) { shown.setZoom(shown.zoom() / PreviewView::zoomStep); });
+    add("<Control>0|<Control>KP_0", [](PreviewView& shown) { shown.setZoom(PreviewView::minZoom); });
+    add("<Control>g|F3", [](PreviewView& shown) { shown.showMatch(components::MatchStep::Next); });
+    add("<Control><Shift>g|<Shift>F3",
+        [](PreviewView& shown) { shown.showMatch(components::MatchStep::Previous); });
+    gtk_widget_add_controller(widget, controller);
+}
+
+void addPreviewMakers(PeerContext& context, const std::shared_ptr<PreviewModule>& previews)
+{
+    addOwnMaker<components::PreviewPictureView, PictureNative>(context);
+    addOwnMaker<components::PreviewPagesView, PagesNative>(context);
+    addModuleMaker(context, previews, &PreviewLibraries::makeTextNative);
+    addModuleMaker(context, previews, &PreviewLibraries::makeMediaNative);
+}
+
+} // namespace host::gtk

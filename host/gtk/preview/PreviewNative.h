@@ -1,0 +1,31 @@
+#pragma once
+
+#include "host/gtk/base/ObjectRef.h"
+#include "host/gtk/base/PeerContext.h"
+#include "screens/preview/PreviewView.h"
+
+#include <gtk/gtk.h>
+
+#include <memory>
+
+namespace host::gtk {
+
+class PreviewModule;
+
+/// The native side of a previewed document's view. It lives as long as its widget. Main thread only.
+class PreviewNative : public platform::components::PreviewViewObserver,
+                      public std::enable_shared_from_this<PreviewNative> {
+public:
+    virtual GtkWidget* widget() const = 0;
+    /// Shows the view for the first time.
+    virtual void start() = 0;
+
+protected:
+    /// Ctrl+F and the keys for the zoom, wherever the focus is in the window while the widget is seen.
+    static void addShortcuts(GtkWidget* widget, const std::weak_ptr<platform::components::PreviewView>& view);
+};
+
+/// Makes a context know the views of previewed documents.
+void addPreviewMakers(PeerContext& context, const std::shared_ptr<PreviewModule>& previews);
+
+} // namespace host::gtk

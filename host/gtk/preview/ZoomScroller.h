@@ -1,0 +1,83 @@
+#pragma once
+
+#include "host/gtk/base/ObjectRef.h"
+#include "host/gtk/base/Signal.h"
+#include "host/gtk/preview/ZoomCanvas.h"
+#include "platform/Geometry.h"
+
+#include <gtk/gtk.h>
+
+#include <memory>
+#include <optional>
+
+namespace host::gtk {
+
+/// What is shown in a zoom scroller. Its size at a zoom of 1 depends on the window alone, and everything
+/// grows with the zoom. Points.
+class ZoomContent {
+public:
+    virtual ~ZoomContent() = default;
+    /// The size at a zoom of 1 in a window of this size.
+    virtual platform::Size baseSize(platform::Size window) = 0;
+    /// Draws what lies in `visible`; the origin is that of the content.
+    virtual void draw(GtkSnapshot* snapshot, const platform::Rect& visible) = 0;
+    /// Another zoom is shown: before it is drawn and laid out.
+    virtual void zoomed(double zoom) = 0;
+    /// Another part is seen.
+    virtual void sees(const platform::Rect& visible) = 0;
+};
+
+/// Scrolls and zooms a content by pinching, double tap, Ctrl with the wheel, and keys. Main thread only.
+class ZoomScroller : public ZoomCanvasClient {
+public:
+    enum class Drag { Scrolls, IsForContent }; ///< of the mouse; a finger always scrolls
+
+    ZoomScroller(ZoomContent& content, GtkAccessibleRole role, Drag drag);
+    ~ZoomScroller() override;
+    ZoomScroller(const ZoomScroller&) = delete;
+    ZoomScroller& operator=(const ZoomScroller&) = delete;
+
+    GtkWidget* widget() const { return _window.get(); } ///< the scrolled window
+    GtkWidget* canvas() const { return _canvas; }
+
+    double zoom() const { return _zoom; }
+    void setZoom(double zoom); ///< keeps the middle
+    /// The content has another size or look.
+    void contentDidChange();
+    void scrollTo(platform::Point content); ///< brings a place to the top left corner, as far as it goes
+    platform::Rect visible() const; ///< in the content
+    platform::Point toContent(platform::Point window) const;
+
+    void zoomCanvasAllocate(int width, int height) override;
+    void zoomCanvasSnapshot(GtkSnapshot* snapshot) override;
+    void zoomCanvasScrolled() override;
+
+private:
+    void addPinch();
+    void addWheel();
+    void addDoubleTap();
+    void addDrag();
+    void addKeys();
+    bool pressed(guint key);
+    bool scrollBy(double pagesX, double pagesY);
+    void zoomAt(double zoom, platform::Point window);
+    void place(platform::Point wanted); ///< the content's point at the window's corner
+    platform::Size contentSize() const { return {_base.width * _zoom, _base.height * _zoom}; }
+    platform::Point margin() const; ///< around content that is smaller than the window
+    GtkAdjustment* horizontal() const { return ZoomCanvas::adjustment(_canvas, GTK_ORIENTATION_HORIZONTAL); }
+    GtkAdjustment* vertical() const { return ZoomCanvas::adjustment(_canvas, GTK_ORIENTATION_VERTICAL); }
+    void tellWhatIsSeen();
+
+    ZoomContent& _content;
+    ObjectRef<GtkWidget> _window;
+    GtkWidget* _canvas;
+    platform::Size _windowSize, _base;
+    double _zoom = 1, _pinchStart = 1;
+    platform::Point _dragStart, _pointer;
+    std::optional<platform::Point> _pinched; ///< the middle of the two fingers
+    bool _isPlacing = false;
+    std::optional<platform::Point> _wanted; ///< a place to go to once there is a window
+    SignalConnections _connections;
+};
+
+} // namespace host::gtk

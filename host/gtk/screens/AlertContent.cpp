@@ -1,0 +1,258 @@
+#include "host/gtk/screens/AlertContent.h"
+
+#include "host/gtk/screens/BarItemPeer.h"
+#include "host/gtk/screens/ScrolledBody.h"
+#include "host/gtk/views/TextFieldPeer.h"
+#include "kit/HostedView.h"
+#include "kit/TextField.h"
+
+#include <algorithm>
+
+namespace host::gtk {
+
+namespace ui = platform::ui;
+
+namespace {
+
+constexpr double fieldHeight = 44; ///< points
+constexpr double assumedWidth = 280; ///< of the content, before the alert has a width
+constexpr std::size_t standingButtons = 3; ///< a low window has room for so many below the text
+constexpr std::size_t longestTitleBesideAnother = 14; ///< characters
+
+GtkWidget* makeLabel(const char* styleClass)
+{
+    auto* label = gtk_label_new(nullptr);
+    gtk_label_set_wrap(GTK_LABEL(label), TRUE);
+    gtk_label_set_wrap_mode(GTK_LABEL(label), PANGO_WRAP_WORD_CHAR);
+    gtk_label_set_justify(GTK_LABEL(label), GTK_JUSTIFY_CENTER);
+    // A name that is broken must not look as if it had hyphens.
+    auto* attributes = pango_attr_list_new();
+    pango_attr_list_insert(attributes, pango_attr_insert_hyphens_new(FALSE));
+    gtk_label_set_attributes(GTK_LABEL(label), attributes);
+    pango_attr_list_unref(attributes);
+    gtk_label_set_max_width_chars(GTK_LABEL(label), 36);
+    gtk_widget_add_css_class(label, styleClass);
+    return label;
+}
+
+/// Two short buttons stand beside each other, others in a column.
+GtkOrientation buttonOrientation(const ui::AlertController& alert)
+{
+    const auto& actions = alert.actions();
+    const bool isShort = std::ranges::all_of(
+        actions, [](const auto& action) { return action->title().size() <= longestTitleBesideAnother; });
+    const bool isRow = alert.alertStyle() == ui::AlertStyle::Alert && actions.size() == 2 && isShort;
+    return isRow ? GTK_ORIENTATION_HORIZONTAL : GTK_ORIENTATION_VERTICAL;
+}
+
+/// The preferred action; without one, and in every sheet, the one that cancels.
+bool standsOut(const ui::AlertAction& action, const ui::AlertController& alert)
+{
+    const auto preferred = alert.preferredAction();
+    const bool mayCancel = !preferred || alert.alertStyle() == ui::AlertStyle::ActionSheet;
+    return preferred.get() == &action || (mayCancel && action.style() == ui::AlertActionStyle::Cancel);
+}
+
+void setText(GtkWidget* label, const std::string& text)
+{
+    gtk_label_set_label(GTK_LABEL(label), text.c_str());
+    gtk_widget_set_visible(label, !text.empty());
+}
+
+/// Gives the focus to the first widget that takes it.
+bool focusWithin(GtkWidget* widget)
+{
+    if (gtk_widget_get_focusable(widget) && gtk_widget_grab_focus(widget))
+        return true;
+    for (auto* child = gtk_widget_get_first_child(widget); child;
+         child = gtk_widget_get_next_sibling(child)) {
+        if (focusWithin(child))
+            return true;
+    }
+    return false;
+}
+
+} // namespace
+
+/// Gathers what the alert tells, once a frame.
+class AlertContent::Observer : public ui::AlertObserver {
+public:
+    explicit Observer(AlertContent& content)
+        : _content(content)
+    {
+    }
+    ~Observer() override { _content._context->scheduler().cancel(this); }
+    void alertDidChange(ui::AlertController&) override
+    {
+        _content._context->scheduler().schedule(this, [this] { _content.mirror(); });
+    }
+
+private:
+    AlertContent& _content;
+};
+
+AlertContent::AlertContent(std::shared_ptr<PeerContext> context, std::shared_ptr<ui::AlertController> alert)
+    : _context(std::move(context))
+    , _alert(alert)
+    , _card(ObjectRef<GtkWidget>::retain(GTK_WIDGET(g_object_new(GTK_TYPE_BOX, "accessible-role",
+          GTK_ACCESSIBLE_ROLE_ALERT_DIALOG, "orientation", GTK_ORIENTATION_VERTICAL, nullptr))))
+    , _lines(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0))
+    , _body(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0))
+    , _title(makeLabel("alert-title"))
+    , _message(makeLabel("alert-message"))
+    , _observer(std::make_shared<Observer>(*this))
+{
+    gtk_widget_add_css_class(widget(), "alert");
+    buildBody();
+    addFields(*alert);
+    addContentView(*alert);
+    mirror();
+    alert->setAlertObserver(_observer);
+}
+
+AlertContent::~AlertContent()
+{
+    _observer.reset();
+    _connections.clear();
+    for (auto& peer : _peers) {
+        gtk_box_remove(GTK_BOX(_body), peer->widget());
+        _context->scheduler().release(std::move(peer));
+    }
+}
+
+/// What does not fit a low window is scrolled, a few buttons stay.
+void AlertContent::buildBody()
+{
+    gtk_widget_add_css_class(_body, "alert-body");
+    gtk_box_append(GTK_BOX(_body), _title);
+    gtk_box_append(GTK_BOX(_body), _message);
+    gtk_box_append(GTK_BOX(_lines), _body);
+    gtk_box_append(GTK_BOX(widget()), makeScrolledBody(_lines));
+}
+
+void AlertContent::addFields(const Alert& alert)
+{
+    for (const auto& field : alert.textFields()) {
+        auto peer = std::make_shared<TextFieldPeer>(_context, field);
+        peer->start();
+        peer->setOnReturn([this] { returnPressed(); });
+        // The alert gives its fields their places; the model's own frames have no part in it.
+        peer->setRoot([](platform::Size) {}, [](double) { return platform::Size{0, fieldHeight}; });
+        if (field->accessibility().label.empty() && field->placeholder().empty())
+            peer->setAccessibleName(alert.message().empty() ? alert.title() : alert.message());
+        gtk_box_append(GTK_BOX(_body), peer->widget());
+        _peers.push_back(std::move(peer));
+    }
+}
+
+void AlertContent::addContentView(const Alert& alert)
+{
+    const auto content = alert.contentViewController();
+    if (!content)
+        return;
+    const std::weak_ptr<ui::View> weak = content->view();
+    auto peer = makePeer(_context, content->view());
+    const auto resize = [weak](platform::Size size) {
+        if (const auto view = weak.lock())
+            view->setFrame({0, 0, size.width, size.height});
+    };
+    const auto fit = [weak](double forWidth) -> platform::Size {
+        const auto view = weak.lock();
+        if (!view)
+            return {};
+        const double width = forWidth > 0 ? forWidth : assumedWidth;
+        return {0, view->systemLayoutSizeFitting({width, 0}).height};
+    };
+    peer->setRoot(resize, fit);
+    gtk_box_append(GTK_BOX(_body), peer->widget());
+    _peers.push_back(std::move(peer));
+}
+
+GtkWidget* AlertContent::makeActionButton(const std::shared_ptr<ui::AlertAction>& action, const Alert& alert)
+{
+    auto* button = gtk_button_new_with_label(action->title().c_str());
+    gtk_widget_add_css_class(button, "alert-action");
+    gtk_widget_set_hexpand(button, TRUE);
+    if (action->style() == ui::AlertActionStyle::Destructive)
+        gtk_widget_add_css_class(button, "destructive");
+    if (standsOut(*action, alert))
+        gtk_widget_add_css_class(button, "preferred");
+    const std::weak_ptr<ui::AlertAction> weak = action;
+    _connections.push_back(connectSignal<void()>(button, "clicked", [alertOfButton = _alert, weak] {
+        const auto pressed = weak.lock();
+        if (const auto asked = alertOfButton.lock(); asked && pressed)
+            asked->press(pressed);
+    }));
+    return button;
+}
+
+void AlertContent::rebuildButtons(const Alert& alert)
+{
+    _connections.clear();
+    _buttons.clear();
+    if (_buttonBox)
+        gtk_box_remove(GTK_BOX(gtk_widget_get_parent(_buttonBox)), _buttonBox);
+    const auto orientation = buttonOrientation(alert);
+    _buttonBox = gtk_box_new(orientation, 0);
+    gtk_box_set_homogeneous(GTK_BOX(_buttonBox), orientation == GTK_ORIENTATION_HORIZONTAL);
+    gtk_widget_add_css_class(_buttonBox, "alert-actions");
+    gtk_widget_add_css_class(_buttonBox, orientation == GTK_ORIENTATION_HORIZONTAL ? "in-row" : "in-column");
+    for (const auto& action : alert.actions()) {
+        _buttons.push_back(makeActionButton(action, alert));
+        gtk_box_append(GTK_BOX(_buttonBox), _buttons.back());
+    }
+    const bool areFew = _buttons.size() <= standingButtons;
+    gtk_box_append(GTK_BOX(areFew ? widget() : _lines), _buttonBox);
+}
+
+void AlertContent::mirror()
+{
+    const auto alert = _alert.lock();
+    if (!alert)
+        return;
+    setText(_title, alert->title());
+    setText(_message, alert->message());
+    if (_buttons.size() != alert->actions().size() || !_buttonBox)
+        rebuildButtons(*alert);
+    for (std::size_t i = 0; i < _buttons.size(); ++i)
+        gtk_widget_set_sensitive(_buttons[i], alert->actions()[i]->isEnabled());
+    auto* accessible = GTK_ACCESSIBLE(widget());
+    const auto& name = alert->title().empty() ? alert->message() : alert->title();
+    gtk_accessible_update_property(accessible, GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
+    gtk_accessible_update_property(
+        accessible, GTK_ACCESSIBLE_PROPERTY_DESCRIPTION, alert->message().c_str(), -1);
+}
+
+void AlertContent::returnPressed()
+{
+    const auto alert = _alert.lock();
+    if (alert && alert->preferredAction())
+        alert->press(alert->preferredAction());
+}
+
+void AlertContent::focus()
+{
+    const auto alert = _alert.lock();
+    if (!alert)
+        return;
+    if (!alert->textFields().empty() && !_peers.empty()) {
+        alert->textFields().front()->becomeFirstResponder();
+        _peers.front()->grabFocus();
+        return;
+    }
+    // What is written in an alert is what it is there for.
+    const auto content = alert->contentViewController();
+    const bool isHosted = content && std::dynamic_pointer_cast<ui::HostedView>(content->view());
+    if (isHosted && !_peers.empty() && focusWithin(_peers.front()->widget()))
+        return;
+    const auto preferred = alert->preferredAction() ? alert->preferredAction() : alert->escapeAction();
+    for (std::size_t i = 0; i < _buttons.size(); ++i) {
+        if (!preferred || alert->actions()[i] == preferred) {
+            gtk_widget_grab_focus(_buttons[i]);
+            return;
+        }
+    }
+    gtk_widget_child_focus(widget(), GTK_DIR_TAB_FORWARD);
+}
+
+} // namespace host::gtk

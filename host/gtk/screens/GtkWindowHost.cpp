@@ -1,0 +1,44 @@
+#include "host/gtk/screens/GtkWindowHost.h"
+
+namespace host::gtk {
+
+namespace {
+
+/// The toolkit draws a window's first frame before anything else that waits. What the main queue has for it
+/// by now, such as the rows of its list, would only be seen in a second frame.
+void showAfterWaitingWork(const std::weak_ptr<WindowPeer>& peer)
+{
+    using Held = std::weak_ptr<WindowPeer>;
+    const auto show = [](gpointer held) -> gboolean {
+        if (const auto shown = static_cast<Held*>(held)->lock())
+            shown->show();
+        return G_SOURCE_REMOVE;
+    };
+    // The main queue has the same priority, and comes first.
+    g_idle_add_full(GDK_PRIORITY_REDRAW, show, std::make_unique<Held>(peer).release(),
+        [](gpointer held) { delete static_cast<Held*>(held); });
+}
+
+} // namespace
+
+GtkWindowHost::GtkWindowHost(
+    AdwApplication* application, const WindowSize& size, std::shared_ptr<PreviewModule> previews)
+    : _application(application)
+    , _size(size)
+    , _previews(std::move(previews))
+{
+}
+
+void GtkWindowHost::showWindow(const std::shared_ptr<platform::ui::Window>& window)
+{
+    if (_peer && _peer->model() == window) {
+        _peer->show();
+        return;
+    }
+    _peer = WindowPeer::make(_application, window, _size, _previews);
+    if (_onShow)
+        _onShow(*_peer);
+    showAfterWaitingWork(_peer);
+}
+
+} // namespace host::gtk

@@ -1,0 +1,34 @@
+#pragma once
+
+#include "host/gtk/screens/WindowPeer.h"
+#include "kit/WindowHost.h"
+
+#include <functional>
+#include <memory>
+
+namespace host::gtk {
+
+/// Shows the application's window. Main thread only.
+class GtkWindowHost : public platform::ui::WindowHost {
+public:
+    /// `application` may be null: windows then stand for themselves.
+    GtkWindowHost(
+        AdwApplication* application, const WindowSize& size, std::shared_ptr<PreviewModule> previews);
+
+    void showWindow(const std::shared_ptr<platform::ui::Window>& window) override;
+    /// The window that is shown; null: none.
+    const std::shared_ptr<WindowPeer>& windowPeer() const { return _peer; }
+    /// Called for each window before it is on the screen.
+    void setOnShow(std::function<void(WindowPeer&)> callback) { _onShow = std::move(callback); }
+    /// Takes the window away.
+    void close() { _peer.reset(); }
+
+private:
+    AdwApplication* _application;
+    WindowSize _size;
+    std::shared_ptr<PreviewModule> _previews;
+    std::shared_ptr<WindowPeer> _peer;
+    std::function<void(WindowPeer&)> _onShow;
+};
+
+} // namespace host::gtk

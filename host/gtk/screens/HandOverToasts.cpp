@@ -1,0 +1,141 @@
+#include "host/gtk/screens/HandOverToasts.h"
+
+#include "platform/CloudDocumentService.h"
+#include "platform/Dispatch.h"
+#include "platform/Localization.h"
+#include "platform/Services.h"
+#include "screens/DisplayName.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace host::gtk {
+
+using platform::ActivityOffer;
+using platform::services;
+using platform::UserActivity;
+
+namespace {
+
+constexpr int titleLines = 2;
+
+/// The same for as long as one device shows one document.
+std::string keyOf(const ActivityOffer& offer)
+{
+    return offer.deviceIdentifier + '\n' + offer.document.path();
+}
+
+/// A toast's own title has one line, in which a phone would show neither the name nor the device in full.
+GtkWidget* makeTitle(const ActivityOffer& offer)
+{
+    using platform::components::displayName;
+    const auto text = platform::localized(
+        "“%1$@” on %2$@", {displayName(offer.document.lastPathComponent()), displayName(offer.deviceName)});
+    auto* title = gtk_label_new(text.c_str());
+    gtk_label_set_wrap(GTK_LABEL(title), TRUE);
+    gtk_label_set_wrap_mode(GTK_LABEL(title), PANGO_WRAP_WORD_CHAR);
+    gtk_label_set_lines(GTK_LABEL(title), titleLines);
+    gtk_label_set_ellipsize(GTK_LABEL(title), PANGO_ELLIPSIZE_END);
+    gtk_label_set_xalign(GTK_LABEL(title), 0);
+    gtk_widget_add_css_class(title, "heading");
+    return title;
+}
+
+std::string bookmarkOf(const UserActivity& activity)
+{
+    const auto* value = platform::find(activity.userInfo, platform::activityKey::documentURL);
+    const auto* text = value ? value->get<std::string>() : nullptr;
+    return text ? *text : std::string();
+}
+
+} // namespace
+
+std::shared_ptr<HandOverToasts> HandOverToasts::make(
+    AdwToastOverlay* overlay, Continue continueActivity, Fail failed)
+{
+    const auto toasts =
+        std::make_shared<HandOverToasts>(overlay, std::move(continueActivity), std::move(failed));
+    toasts->_offers = services().notificationCenter().observe(
+        platform::Notification::ActivityOffersDidChange, [weak = std::weak_ptr(toasts)](const auto&) {
+            if (const auto self = weak.lock())
+                self->refresh();
+        });
+    toasts->refresh();
+    return toasts;
+}
+
+HandOverToasts::HandOverToasts(AdwToastOverlay* overlay, Continue continueActivity, Fail failed)
+    : _overlay(ObjectRef<AdwToastOverlay>::retain(overlay))
+    , _continue(std::move(continueActivity))
+    , _fail(std::move(failed))
+{
+}
+
+HandOverToasts::~HandOverToasts()
+{
+    takeAway();
+}
+
+void HandOverToasts::refresh()
+{
+    const auto offers = services().activityHandOver().offers();
+    std::erase_if(_settled, [&](const auto& key) {
+        return std::ranges::none_of(offers, [&](const auto& offer) { return keyOf(offer) == key; });
+    });
+    const auto latest =
+        std::ranges::find_if(offers, [&](const auto& offer) { return !_settled.contains(keyOf(offer)); });
+    if (latest != offers.end() && keyOf(*latest) == _shown)
+        return;
+    takeAway();
+    if (latest != offers.end())
+        show(*latest);
+}
+
+void HandOverToasts::show(const ActivityOffer& offer)
+{
+    _shown = keyOf(offer);
+    _toast = ObjectRef<AdwToast>::retain(adw_toast_new(""));
+    adw_toast_set_custom_title(_toast.get(), makeTitle(offer));
+    adw_toast_set_button_label(_toast.get(), platform::localized("Continue").c_str());
+    adw_toast_set_timeout(_toast.get(), 0);
+    _connections.push_back(
+        connectSignal<void()>(_toast.get(), "button-clicked", [weak = weak_from_this(), offer] {
+            if (const auto self = weak.lock())
+                self->chosen(offer);
+        }));
+    _connections.push_back(connectSignal<void()>(_toast.get(), "dismissed", [weak = weak_from_this()] {
+        const auto self = weak.lock();
+        if (!self)
+            return;
+        self->_settled.insert(std::exchange(self->_shown, {}));
+        self->_toast = {};
+        self->refresh();
+    }));
+    adw_toast_overlay_add_toast(_overlay.get(), _toast.get());
+}
+
+void HandOverToasts::takeAway()
+{
+    _connections.clear();
+    _shown.clear();
+    if (const auto toast = std::exchange(_toast, {}))
+        adw_toast_dismiss(toast.get());
+}
+
+/// The document may have gone since it was offered: that is found out before the stack is touched.
+void HandOverToasts::chosen(const ActivityOffer& offer)
+{
+    services().cloudDocumentService().items().decodeBookmark(bookmarkOf(offer.activity),
+        [weak = weak_from_this(), activity = offer.activity, main = services().dispatch().mainQueue()](
+            const platform::Result<platform::Url>& document) {
+            main->async([weak, activity, error = document.error] {
+                const auto self = weak.lock();
+                if (self && error)
+                    self->_fail(activity, *error);
+                else if (self)
+                    self->_continue(activity);
+            });
+        });
+}
+
+} // namespace host::gtk

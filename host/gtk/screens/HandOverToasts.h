@@ -1,0 +1,52 @@
+#pragma once
+
+#include "host/gtk/base/ObjectRef.h"
+#include "host/gtk/base/Signal.h"
+#include "platform/ActivityHandOver.h"
+#include "platform/Error.h"
+#include "platform/NotificationCenter.h"
+
+#include <adwaita.h>
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <set>
+#include <string>
+
+namespace host::gtk {
+
+/// Offers, at the bottom of the window, to go on with what another device of the account shows. One that the
+/// user dismissed or took does not come back until the device shows something else. Main thread only.
+class HandOverToasts : public std::enable_shared_from_this<HandOverToasts> {
+public:
+    using Continue = std::function<void(const platform::UserActivity&)>;
+    /// Called when the document of an offer that the user took can't be found any more.
+    using Fail = std::function<void(const platform::UserActivity&, const platform::Error&)>;
+
+    /// Shows what is offered now, and follows the installed service's offers.
+    static std::shared_ptr<HandOverToasts> make(
+        AdwToastOverlay* overlay, Continue continueActivity, Fail failed);
+    HandOverToasts(AdwToastOverlay* overlay, Continue continueActivity, Fail failed);
+    ~HandOverToasts();
+
+    /// The toast on the screen; null: none.
+    AdwToast* toast() const { return _toast.get(); }
+
+private:
+    void refresh();
+    void show(const platform::ActivityOffer& offer);
+    void takeAway();
+    void chosen(const platform::ActivityOffer& offer);
+
+    ObjectRef<AdwToastOverlay> _overlay;
+    Continue _continue;
+    Fail _fail;
+    platform::Observation _offers;
+    ObjectRef<AdwToast> _toast;
+    SignalConnections _connections; ///< of the toast
+    std::string _shown; ///< what the toast is about
+    std::set<std::string> _settled; ///< what the user dismissed or took
+};
+
+} // namespace host::gtk

@@ -1,0 +1,181 @@
+#include "host/gtk/screens/LayerFactory.h"
+
+#include "host/gtk/base/ViewPeer.h"
+#include "host/gtk/screens/AlertContent.h"
+#include "host/gtk/screens/OverlayLayer.h"
+#include "host/gtk/screens/PopoverLayer.h"
+#include "host/gtk/screens/ScreenPeer.h"
+#include "host/gtk/screens/SearchContent.h"
+#include "kit/NavigationController.h"
+#include "kit/ViewControllerVisitor.h"
+
+#include <cmath>
+#include <optional>
+
+namespace host::gtk {
+
+namespace ui = platform::ui;
+
+namespace {
+
+constexpr int popoverWidth = 320, popoverHeight = 420; ///< of a screen in a popover, points
+constexpr int widestPopover = 360; ///< its arrow and shadow included
+
+/// A whole screen as the content of a layer.
+class ScreenContent : public LayerContent {
+public:
+    ScreenContent(
+        const std::shared_ptr<PeerContext>& context, const std::shared_ptr<ui::ViewController>& screen)
+        : _box(ObjectRef<GtkWidget>::retain(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0)))
+        , _peer(makeScreenPeer(context, screen, WindowButtons::Hidden))
+    {
+        gtk_box_append(GTK_BOX(widget()), _peer->widget());
+    }
+    ~ScreenContent() override { gtk_box_remove(GTK_BOX(widget()), _peer->widget()); }
+
+    GtkWidget* widget() const override { return _box.get(); }
+    void focus() override { _peer->focus(); }
+
+private:
+    ObjectRef<GtkWidget> _box;
+    std::shared_ptr<ScreenPeer> _peer;
+};
+
+std::optional<GdkRectangle> boundsIn(GtkWidget* canvas, GtkWidget* widget, std::optional<platform::Rect> part)
+{
+    graphene_rect_t bounds;
+    if (!widget || !gtk_widget_compute_bounds(widget, canvas, &bounds))
+        return std::nullopt;
+    const auto& rect = part ? *part : platform::Rect{0, 0, bounds.size.width, bounds.size.height};
+    const auto whole = [](double points) { return static_cast<int>(std::lround(points)); };
+    return GdkRectangle{whole(bounds.origin.x + rect.x), whole(bounds.origin.y + rect.y),
+        std::max(1, whole(rect.width)), std::max(1, whole(rect.height))};
+}
+
+/// The rectangle of a view, which may be one that only marks a place in another that is shown.
+std::optional<GdkRectangle> boundsIn(
+    GtkWidget* canvas, const PeerContext& context, const ui::View& view, const platform::Rect& rect)
+{
+    auto shown = const_cast<ui::View&>(view).shared_from_this();
+    const auto isShown = [&] {
+        const auto* peer = context.peerOf(*shown);
+        return peer && gtk_widget_get_mapped(peer->widget());
+    };
+    while (!isShown()) {
+        shown = shown->superview();
+        if (!shown)
+            return std::nullopt;
+    }
+    return boundsIn(canvas, context.peerOf(*shown)->widget(), view.convertRect(rect, *shown));
+}
+
+/// Where a popover points at, in the window; nothing when there is no such place now.
+std::optional<GdkRectangle> anchorOf(
+    const PeerContext& context, GtkWidget* canvas, const ui::PopoverAnchor& anchor)
+{
+    if (const auto* item = std::get_if<std::weak_ptr<ui::BarButtonItem>>(&anchor)) {
+        const auto shown = item->lock();
+        return shown ? boundsIn(canvas, context.widgetOf(*shown), {}) : std::nullopt;
+    }
+    if (const auto* place = std::get_if<ui::ViewAnchor>(&anchor)) {
+        const auto view = place->view.lock();
+        return view ? boundsIn(canvas, context, *view, place->rect) : std::nullopt;
+    }
+    return std::nullopt;
+}
+
+/// Beside the anchor where only such arrows are allowed and there is room, else towards the window's middle.
+GtkPositionType sideOf(const ui::PopoverAnchor& anchor, const GdkRectangle& place, platform::Size window)
+{
+    const auto* view = std::get_if<ui::ViewAnchor>(&anchor);
+    if (view && view->arrows == ui::ArrowDirections::LeftOrRight) {
+        if (window.width - place.x - place.width >= widestPopover)
+            return GTK_POS_RIGHT;
+        if (place.x >= widestPopover)
+            return GTK_POS_LEFT;
+    }
+    return place.y + place.height / 2 > window.height / 2 ? GTK_POS_TOP : GTK_POS_BOTTOM;
+}
+
+class LayerMaker : public ui::ViewControllerVisitor {
+public:
+    LayerMaker(const std::shared_ptr<PeerContext>& context, const LayerSite& site)
+        : _context(context)
+        , _site(site)
+    {
+    }
+
+    void visit(ui::ViewController& screen) override { makeScreen(screen); }
+    void visit(ui::NavigationController& screen) override { makeScreen(screen); }
+    void visit(ui::AlertController& screen) override
+    {
+        const auto alert = std::static_pointer_cast<ui::AlertController>(screen.shared_from_this());
+        const auto content = [&] { return std::make_unique<AlertContent>(_context, alert); };
+        if (screen.alertStyle() == ui::AlertStyle::Alert)
+            makeOverlay(screen, content(), LayerPlace::Center);
+        else if (const auto anchor = popoverAnchor(screen))
+            makePopover(screen, content(), *anchor);
+        else
+            makeOverlay(screen, content(), isWide() ? LayerPlace::Center : LayerPlace::Bottom);
+    }
+    void visit(ui::SearchPresentation& screen) override
+    {
+        const auto search = std::static_pointer_cast<ui::SearchPresentation>(screen.shared_from_this());
+        makeOverlay(screen, std::make_unique<SearchContent>(_context, search), LayerPlace::Cover);
+    }
+
+    std::unique_ptr<PresentedLayer> layer;
+
+private:
+    bool isWide() const { return _site.size.width >= wideWindow; }
+    std::optional<GdkRectangle> popoverAnchor(const ui::ViewController& screen) const
+    {
+        return isWide() ? anchorOf(*_context, _site.canvas, screen.popoverAnchor()) : std::nullopt;
+    }
+    static std::function<void()> cancel(ui::ViewController& screen)
+    {
+        return [weak = screen.weak_from_this()] {
+            if (const auto left = weak.lock())
+                left->userCancelled();
+        };
+    }
+    void makeScreen(ui::ViewController& screen)
+    {
+        auto content = std::make_unique<ScreenContent>(_context, screen.shared_from_this());
+        const auto style = screen.presentationStyle();
+        const auto anchor = style == ui::PresentationStyle::Popover ? popoverAnchor(screen) : std::nullopt;
+        if (anchor) {
+            gtk_widget_set_size_request(content->widget(), popoverWidth, popoverHeight);
+            makePopover(screen, std::move(content), *anchor);
+            return;
+        }
+        const bool fills = style == ui::PresentationStyle::FullScreen || !isWide();
+        makeOverlay(screen, std::move(content), fills ? LayerPlace::Cover : LayerPlace::Sheet);
+    }
+    void makeOverlay(ui::ViewController& screen, std::unique_ptr<LayerContent> content, LayerPlace place)
+    {
+        layer = std::make_unique<OverlayLayer>(_site.overlay, std::move(content), place, cancel(screen));
+    }
+    void makePopover(
+        ui::ViewController& screen, std::unique_ptr<LayerContent> content, const GdkRectangle& anchor)
+    {
+        const auto side = sideOf(screen.popoverAnchor(), anchor, _site.size);
+        layer =
+            std::make_unique<PopoverLayer>(_site.canvas, anchor, side, std::move(content), cancel(screen));
+    }
+
+    const std::shared_ptr<PeerContext>& _context;
+    const LayerSite& _site;
+};
+
+} // namespace
+
+std::unique_ptr<PresentedLayer> makeLayer(const std::shared_ptr<PeerContext>& context, const LayerSite& site,
+    const std::shared_ptr<ui::ViewController>& screen)
+{
+    LayerMaker maker(context, site);
+    screen->accept(maker);
+    return std::move(maker.layer);
+}
+
+} // namespace host::gtk

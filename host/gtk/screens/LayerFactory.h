@@ -1,0 +1,29 @@
+#pragma once
+
+#include "host/gtk/base/PeerContext.h"
+#include "host/gtk/screens/PresentedLayer.h"
+#include "platform/Geometry.h"
+
+#include <memory>
+
+namespace platform::ui {
+class ViewController;
+}
+
+namespace host::gtk {
+
+/// Where layers go: over `overlay`, popovers on `canvas`, in a window of this size.
+struct LayerSite {
+    GtkOverlay* overlay;
+    GtkWidget* canvas;
+    platform::Size size;
+};
+
+/// The layer of a presented screen, by the kind of screen, its style and the window's width.
+std::unique_ptr<PresentedLayer> makeLayer(const std::shared_ptr<PeerContext>& context, const LayerSite& site,
+    const std::shared_ptr<platform::ui::ViewController>& screen);
+
+/// A window of at least this width has popovers and sheets, a narrower one is filled.
+inline constexpr double wideWindow = 600; ///< points
+
+} // namespace host::gtk

@@ -1,0 +1,52 @@
+#pragma once
+
+#include "host/gtk/screens/BarItemPeer.h"
+
+#include "kit/Menu.h"
+
+#include <functional>
+#include <vector>
+
+namespace platform::ui {
+class NavigationItem;
+}
+
+namespace host::gtk {
+
+/// The bar at the top of a screen.
+class NavigationBarPeer {
+public:
+    explicit NavigationBarPeer(std::shared_ptr<PeerContext> context);
+    ~NavigationBarPeer();
+
+    GtkWidget* widget() const { return _bar.get(); }
+    GtkWidget* backButton() const { return _back; }
+    void setOnBack(std::function<void()> callback) { _onBack = std::move(callback); }
+
+    /// `hasBackTarget` says whether there is a screen to go back to.
+    void show(const platform::ui::NavigationItem& item, bool hasBackTarget);
+    /// A narrow bar keeps of the window's own buttons only the one that closes it, and of its entries the
+    /// compact images.
+    void setNarrow(bool narrow);
+    /// Whether the window's own buttons stand in this bar.
+    void setWindowButtons(bool shown);
+
+private:
+    void showItems(const platform::ui::NavigationItem& item);
+    void showSearch(const platform::ui::NavigationItem& item);
+    void showMenuButton(const platform::ui::NavigationItem& item);
+    void clearItems();
+
+    std::shared_ptr<PeerContext> _context;
+    ObjectRef<GtkWidget> _bar;
+    GtkWidget *_title, *_back, *_search, *_menu;
+    platform::ui::BarButtonItems _left, _right;
+    std::vector<std::shared_ptr<BarItemPeer>> _peers;
+    GtkEventController* _newKey = nullptr;
+    std::function<void()> _onBack, _onSearch, _onNew;
+    std::function<platform::ui::Menu()> _makeMenu;
+    SignalConnections _connections;
+    bool _isNarrow = false;
+};
+
+} // namespace host::gtk

@@ -1,0 +1,66 @@
+#pragma once
+
+#include "host/gtk/base/SizedBin.h"
+#include "host/gtk/screens/ScreenPage.h"
+#include "kit/NavigationObserver.h"
+#include "kit/ViewObserver.h"
+
+#include <adwaita.h>
+
+#include <vector>
+
+namespace host::gtk {
+
+/// Shows a stack of screens as the pages of an AdwLeaflet. A page is built for the top screen and for the one
+/// below it, which a swipe can uncover.
+class NavigationPeer : public ScreenPeer,
+                       public platform::ui::NavigationObserver,
+                       public platform::ui::ViewObserver,
+                       public std::enable_shared_from_this<NavigationPeer> {
+public:
+    static std::shared_ptr<NavigationPeer> make(const std::shared_ptr<PeerContext>& context,
+        const std::shared_ptr<platform::ui::NavigationController>& navigation, WindowButtons buttons);
+    NavigationPeer(std::shared_ptr<PeerContext> context,
+        const std::shared_ptr<platform::ui::NavigationController>& navigation, WindowButtons buttons);
+    ~NavigationPeer() override;
+
+    GtkWidget* widget() const override { return _bin.widget(); }
+    void focus() override;
+
+    AdwLeaflet* leaflet() const { return ADW_LEAFLET(_leaflet.get()); }
+    /// The page of the screen on top; null: the stack is empty.
+    std::shared_ptr<ScreenPage> topPage() const;
+
+    void navigationWillTransition(platform::ui::NavigationController& controller,
+        const platform::ui::NavigationTransition& transition, platform::ui::TransitionToken token) override;
+    void stackDidChange(platform::ui::NavigationController& controller) override;
+    void toolbarVisibilityDidChange(platform::ui::NavigationController& controller, bool animated) override;
+    void viewDidChange(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+
+private:
+    using Screen = std::shared_ptr<platform::ui::ViewController>;
+    std::shared_ptr<ScreenPage> pageOf(const Screen& screen);
+    std::shared_ptr<ScreenPage> knownPageOf(const Screen& screen) const;
+    void showWithoutMovement(const Screen& screen);
+    void showMoving(const platform::ui::NavigationTransition& transition);
+    void forgetFingersThatLeft();
+    void transitionRunningChanged();
+    void swipedAway(const ScreenPage& top);
+    void settle();
+    void removeStalePages();
+    void ensurePageBelowTop();
+    void updateAll();
+    void hideAllButTop() const;
+
+    std::shared_ptr<PeerContext> _context;
+    std::weak_ptr<platform::ui::NavigationController> _navigation;
+    WindowButtons _buttons;
+    SizedBin _bin;
+    ObjectRef<GtkWidget> _leaflet;
+    std::vector<std::shared_ptr<ScreenPage>> _pages; ///< in the order of the leaflet
+    platform::ui::TransitionToken _token;
+    bool _mirroring = false; ///< the program moves the pages, not the user
+    SignalConnections _connections;
+};
+
+} // namespace host::gtk

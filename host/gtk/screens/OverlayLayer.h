@@ -1,0 +1,49 @@
+#pragma once
+
+#include "host/gtk/base/ObjectRef.h"
+#include "host/gtk/base/Signal.h"
+#include "host/gtk/screens/LayerContent.h"
+#include "host/gtk/screens/PresentedLayer.h"
+
+#include <adwaita.h>
+
+#include <memory>
+
+namespace host::gtk {
+
+/// Where a layer's content stands in the window.
+enum class LayerPlace {
+    Center, ///< a card as large as its content
+    Bottom, ///< a card along the lower edge
+    Sheet, ///< a large card
+    Cover, ///< all of the window
+};
+
+/// A layer within the window itself: what lies below is dimmed and takes no input.
+class OverlayLayer : public PresentedLayer {
+public:
+    /// `onOutside` is called when the user taps beside the content.
+    OverlayLayer(GtkOverlay* overlay, std::unique_ptr<LayerContent> content, LayerPlace place,
+        std::function<void()> onOutside);
+    ~OverlayLayer() override;
+
+    void show(bool animated, Done done) override;
+    void hide(bool animated, Done done) override;
+    void focus() override;
+    void setCovered(bool covered) override;
+
+private:
+    void place(LayerPlace place);
+    void connectOutside(std::function<void()> onOutside);
+    void fadeTo(double opacity, bool animated, Done done);
+
+    ObjectRef<GtkOverlay> _overlay;
+    std::unique_ptr<LayerContent> _content;
+    ObjectRef<GtkWidget> _backdrop;
+    GtkWidget* _card = nullptr;
+    ObjectRef<AdwAnimation> _fade;
+    Done _done;
+    SignalConnection _onFaded, _onPressed;
+};
+
+} // namespace host::gtk

@@ -1,0 +1,33 @@
+#pragma once
+
+#include "host/gtk/base/ObjectRef.h"
+#include "host/gtk/base/Signal.h"
+#include "host/gtk/screens/LayerContent.h"
+#include "host/gtk/screens/PresentedLayer.h"
+
+#include <memory>
+
+namespace host::gtk {
+
+/// A layer in a popover that points at a place of the window.
+class PopoverLayer : public PresentedLayer {
+public:
+    /// `parent` is a widget that outlives the layer and lets a popover be its child; `onOutside` is called
+    /// when the user leaves the popover. It stands on `side` of the anchor.
+    PopoverLayer(GtkWidget* parent, const GdkRectangle& anchor, GtkPositionType side,
+        std::unique_ptr<LayerContent> content, std::function<void()> onOutside);
+    ~PopoverLayer() override;
+
+    void show(bool animated, Done done) override;
+    void hide(bool animated, Done done) override;
+    void focus() override;
+    void setCovered(bool) override { }
+
+private:
+    std::unique_ptr<LayerContent> _content;
+    ObjectRef<GtkWidget> _popover;
+    bool _shown = false;
+    SignalConnection _onClosed;
+};
+
+} // namespace host::gtk

@@ -1,0 +1,55 @@
+#pragma once
+
+#include "host/gtk/screens/NavigationBarPeer.h"
+#include "host/gtk/screens/ScreenPeer.h"
+#include "host/gtk/screens/ToolbarPeer.h"
+#include "kit/ViewControllerObserver.h"
+
+#include <memory>
+
+namespace platform::ui {
+class NavigationController;
+class ViewController;
+} // namespace platform::ui
+
+namespace host::gtk {
+
+/// One screen of a navigation between its bars.
+class ScreenPage : public platform::ui::ViewControllerObserver,
+                   public std::enable_shared_from_this<ScreenPage> {
+public:
+    static std::shared_ptr<ScreenPage> make(const std::shared_ptr<PeerContext>& context,
+        const std::shared_ptr<platform::ui::NavigationController>& navigation,
+        const std::shared_ptr<platform::ui::ViewController>& screen, WindowButtons buttons);
+    ScreenPage(std::shared_ptr<PeerContext> context,
+        const std::shared_ptr<platform::ui::NavigationController>& navigation,
+        const std::shared_ptr<platform::ui::ViewController>& screen, WindowButtons buttons);
+    ~ScreenPage() override;
+
+    GtkWidget* widget() const { return _box.get(); }
+    std::shared_ptr<platform::ui::ViewController> screen() const { return _screen.lock(); }
+    NavigationBarPeer& navigationBar() { return _navigationBar; }
+    ViewPeer* content() const { return _content.get(); } ///< null until the screen is shown first
+
+    /// Loads the screen's view and shows it, once.
+    void load();
+    /// Bars as the model has them, in the next frame.
+    void updateBars();
+    void focus();
+
+    void barsDidChange(platform::ui::ViewController& controller) override;
+
+private:
+    void mirrorBars();
+
+    std::shared_ptr<PeerContext> _context;
+    std::weak_ptr<platform::ui::NavigationController> _navigation;
+    std::weak_ptr<platform::ui::ViewController> _screen;
+    ObjectRef<GtkWidget> _box;
+    NavigationBarPeer _navigationBar;
+    ToolbarPeer _toolbar;
+    std::shared_ptr<ViewPeer> _content;
+    SignalConnection _onMap;
+};
+
+} // namespace host::gtk

@@ -1,0 +1,31 @@
+#pragma once
+
+#include "host/gtk/base/PeerContext.h"
+
+#include <memory>
+
+namespace platform::ui {
+class ViewController;
+}
+
+namespace host::gtk {
+
+class ViewPeer;
+
+/// Whether the window's own buttons stand in the bars of a screen.
+enum class WindowButtons { Shown, Hidden };
+
+/// Shows one screen of the kit, with everything that it contains.
+class ScreenPeer {
+public:
+    virtual ~ScreenPeer() = default;
+    virtual GtkWidget* widget() const = 0;
+    /// Moves the keyboard focus into the screen.
+    virtual void focus() = 0;
+};
+
+/// By the kind of screen: a navigation with its bars, or the view of the screen alone.
+std::shared_ptr<ScreenPeer> makeScreenPeer(const std::shared_ptr<PeerContext>& context,
+    const std::shared_ptr<platform::ui::ViewController>& screen, WindowButtons buttons);
+
+} // namespace host::gtk

@@ -1,0 +1,83 @@
+#include "host/gtk/screens/ToolbarPeer.h"
+
+#include "kit/View.h"
+
+#include <algorithm>
+
+namespace host::gtk {
+
+namespace ui = platform::ui;
+
+namespace {
+
+constexpr int itemDistance = 6;
+
+/// Whether a view without a width of its own is among the entries: it then gets what flexible spaces would.
+bool hasTakingView(const ui::BarButtonItems& items)
+{
+    return std::ranges::any_of(items, [](const auto& item) {
+        return item->customView() && item->customView()->intrinsicContentSize().width <= 0;
+    });
+}
+
+} // namespace
+
+ToolbarPeer::ToolbarPeer(std::shared_ptr<PeerContext> context)
+    : _context(std::move(context))
+    , _bar(ObjectRef<GtkWidget>::retain(gtk_revealer_new()))
+    , _box(gtk_box_new(GTK_ORIENTATION_HORIZONTAL, itemDistance))
+{
+    // GtkActionBar keeps its three groups apart; here the entries share the whole width.
+    gtk_widget_set_hexpand(_box, TRUE);
+    gtk_widget_add_css_class(_box, "kit-toolbar");
+    gtk_revealer_set_transition_type(GTK_REVEALER(widget()), GTK_REVEALER_TRANSITION_TYPE_SLIDE_UP);
+    gtk_revealer_set_child(GTK_REVEALER(widget()), _box);
+}
+
+ToolbarPeer::~ToolbarPeer()
+{
+    clear();
+}
+
+void ToolbarPeer::clear()
+{
+    while (auto* child = gtk_widget_get_first_child(_box))
+        gtk_box_remove(GTK_BOX(_box), child);
+    for (auto& peer : std::exchange(_peers, {}))
+        _context->scheduler().release(std::move(peer));
+}
+
+void ToolbarPeer::show(const ui::BarButtonItems& items)
+{
+    if (items == _items)
+        return;
+    clear();
+    _items = items;
+    const bool viewTakesAll = hasTakingView(items);
+    for (const auto& item : items)
+        append(item, viewTakesAll);
+}
+
+void ToolbarPeer::append(const std::shared_ptr<ui::BarButtonItem>& item, bool viewTakesAll)
+{
+    if (!item->isSpace()) {
+        _peers.push_back(BarItemPeer::make(_context, item));
+        if (GTK_IS_BUTTON(_peers.back()->widget()))
+            gtk_widget_add_css_class(_peers.back()->widget(), "flat");
+        gtk_box_append(GTK_BOX(_box), _peers.back()->widget());
+        return;
+    }
+    auto* space = gtk_box_new(GTK_ORIENTATION_HORIZONTAL, 0);
+    if (item->systemItem() == ui::SystemItem::FixedSpace)
+        gtk_widget_set_size_request(space, static_cast<int>(item->width()), -1);
+    else
+        gtk_widget_set_hexpand(space, !viewTakesAll);
+    gtk_box_append(GTK_BOX(_box), space);
+}
+
+void ToolbarPeer::setHidden(bool hidden)
+{
+    gtk_revealer_set_reveal_child(GTK_REVEALER(widget()), !hidden);
+}
+
+} // namespace host::gtk

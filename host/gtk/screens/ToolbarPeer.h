@@ -1,0 +1,31 @@
+#pragma once
+
+#include "host/gtk/screens/BarItemPeer.h"
+
+#include <vector>
+
+namespace host::gtk {
+
+/// The bar at the bottom of a screen.
+class ToolbarPeer {
+public:
+    explicit ToolbarPeer(std::shared_ptr<PeerContext> context);
+    ~ToolbarPeer();
+
+    GtkWidget* widget() const { return _bar.get(); }
+    /// Shows these entries from now on; nothing happens when they are shown already.
+    void show(const platform::ui::BarButtonItems& items);
+    void setHidden(bool hidden);
+
+private:
+    void clear();
+    void append(const std::shared_ptr<platform::ui::BarButtonItem>& item, bool viewTakesAll);
+
+    std::shared_ptr<PeerContext> _context;
+    ObjectRef<GtkWidget> _bar;
+    GtkWidget* _box;
+    platform::ui::BarButtonItems _items;
+    std::vector<std::shared_ptr<BarItemPeer>> _peers;
+};
+
+} // namespace host::gtk

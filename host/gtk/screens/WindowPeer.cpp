@@ -1,0 +1,271 @@
+#include "host/gtk/screens/WindowPeer.h"
+
+#include "host/gtk/preview/NoteNative.h"
+#include "host/gtk/preview/PreviewNative.h"
+#include "host/gtk/screens/LayerFactory.h"
+#include "kit/ViewController.h"
+#include "platform/Localization.h"
+
+#include <algorithm>
+
+namespace host::gtk {
+
+namespace ui = platform::ui;
+using platform::Size;
+
+namespace {
+
+constexpr double lowWindow = 480; ///< points; lower is compact
+
+} // namespace
+
+std::shared_ptr<WindowPeer> WindowPeer::make(AdwApplication* application,
+    const std::shared_ptr<ui::Window>& window, const WindowSize& size,
+    const std::shared_ptr<PreviewModule>& previews)
+{
+    auto peer = std::make_shared<WindowPeer>(application, window, size, previews);
+    window->setObserver(peer);
+    peer->showRoot();
+    return peer;
+}
+
+WindowPeer::WindowPeer(AdwApplication* application, const std::shared_ptr<ui::Window>& window,
+    const WindowSize& size, const std::shared_ptr<PreviewModule>& previews)
+    : _model(window)
+    , _theme(std::make_shared<Theme>())
+    , _measurer(std::make_shared<PangoTextMeasurer>(_theme))
+    , _context(std::make_shared<PeerContext>(_theme, std::make_shared<FrameScheduler>()))
+    , _bin(std::make_unique<SizedBin>([this](Size newSize) { resized(newSize); }))
+{
+    build(application, size);
+    _theme->setReference(_window.get());
+    _theme->setOnChange([this] { themeChanged(); });
+    addPreviewMakers(*_context, previews);
+    addNoteMaker(*_context);
+    _context->scheduler().attach(_window.get());
+    ui::TextMeasurer::install(_measurer);
+    connectWindow();
+    connectInput();
+}
+
+WindowPeer::~WindowPeer()
+{
+    _connections.clear();
+    ui::TextMeasurer::install(nullptr);
+    _layers.clear();
+    _leaving.clear();
+    _root.reset();
+    _bin->setChild(nullptr);
+    gtk_window_destroy(window());
+}
+
+void WindowPeer::build(AdwApplication* application, const WindowSize& size)
+{
+    auto* made = application ? adw_application_window_new(GTK_APPLICATION(application))
+                             : GTK_WIDGET(g_object_new(ADW_TYPE_APPLICATION_WINDOW, nullptr));
+    _window = ObjectRef<GtkWidget>::retain(made);
+    _overlay = gtk_overlay_new();
+    _toasts = ADW_TOAST_OVERLAY(adw_toast_overlay_new());
+    gtk_overlay_set_child(GTK_OVERLAY(_overlay), GTK_WIDGET(_toasts));
+    _bin->setChild(_overlay);
+    adw_application_window_set_content(ADW_APPLICATION_WINDOW(made), _bin->widget());
+    gtk_window_set_title(window(), platform::localized("Tarrow Drive").c_str());
+    gtk_widget_set_size_request(made, minimumWidth, minimumHeight);
+    gtk_window_set_default_size(window(), size.width, size.height);
+    if (size.isMaximized)
+        gtk_window_maximize(window());
+}
+
+void WindowPeer::connectWindow()
+{
+    _connections.push_back(connectNotify(_window.get(), "notify::is-active", [this] {
+        const bool active = gtk_window_is_active(window());
+        if (const auto shown = model())
+            shown->becameKey(active);
+        if (const auto call = _onActive)
+            call(active);
+    }));
+    _connections.push_back(connectSignal<gboolean()>(_window.get(), "close-request", [this]() -> gboolean {
+        closed();
+        return FALSE;
+    }));
+}
+
+void WindowPeer::connectInput()
+{
+    auto* keys = gtk_event_controller_key_new();
+    gtk_widget_add_controller(_window.get(), keys);
+    _connections.push_back(connectSignal<gboolean(guint, guint, GdkModifierType)>(
+        keys, "key-pressed", [this](guint key, guint, GdkModifierType modifiers) -> gboolean {
+            const bool isAlt = (modifiers & GDK_ALT_MASK) != 0;
+            const guint backArrow =
+                gtk_widget_get_direction(_window.get()) == GTK_TEXT_DIR_RTL ? GDK_KEY_Right : GDK_KEY_Left;
+            if (key == GDK_KEY_Escape || key == GDK_KEY_Back || (isAlt && key == backArrow))
+                return goBack();
+            return FALSE;
+        }));
+    constexpr unsigned mouseBackButton = 8;
+    auto* click = gtk_gesture_click_new();
+    gtk_gesture_single_set_button(GTK_GESTURE_SINGLE(click), mouseBackButton);
+    gtk_event_controller_set_propagation_phase(GTK_EVENT_CONTROLLER(click), GTK_PHASE_CAPTURE);
+    gtk_widget_add_controller(_window.get(), GTK_EVENT_CONTROLLER(click));
+    _connections.push_back(connectSignal<void(int, double, double)>(
+        click, "pressed", [this](int, double, double) { goBack(); }));
+}
+
+bool WindowPeer::goBack()
+{
+    const auto keepsSelf = shared_from_this();
+    const auto shown = model();
+    return shown && shown->backRequested();
+}
+
+void WindowPeer::closed()
+{
+    const auto keepsSelf = shared_from_this();
+    if (const auto call = _onClosed)
+        call();
+    if (const auto shown = model())
+        shown->closed();
+}
+
+void WindowPeer::show()
+{
+    gtk_window_present(window());
+}
+
+void WindowPeer::showRoot()
+{
+    const auto shown = model();
+    const auto root = shown ? shown->rootViewController() : nullptr;
+    adw_toast_overlay_set_child(_toasts, nullptr);
+    if (_root)
+        _context->scheduler().release(std::exchange(_root, nullptr));
+    if (!root)
+        return;
+    _root = makeScreenPeer(_context, root, WindowButtons::Shown);
+    adw_toast_overlay_set_child(_toasts, _root->widget());
+}
+
+void WindowPeer::rootDidChange(ui::Window&)
+{
+    showRoot();
+}
+
+ui::TraitCollection WindowPeer::traits(Size size) const
+{
+    ui::TraitCollection traits;
+    traits.horizontalSizeClass = size.width < wideWindow ? ui::SizeClass::Compact : ui::SizeClass::Regular;
+    traits.verticalSizeClass = size.height < lowWindow ? ui::SizeClass::Compact : ui::SizeClass::Regular;
+    traits.layoutDirection = gtk_widget_get_direction(_window.get()) == GTK_TEXT_DIR_RTL
+        ? ui::LayoutDirection::RightToLeft
+        : ui::LayoutDirection::LeftToRight;
+    traits.colorScheme = _theme->isDark() ? ui::ColorScheme::Dark : ui::ColorScheme::Light;
+    return traits;
+}
+
+void WindowPeer::updateScreen(Size size) const
+{
+    ui::Screen screen;
+    screen.bounds = {0, 0, size.width, size.height};
+    screen.scale = gtk_widget_get_scale_factor(_window.get());
+    screen.idiom = size.width < wideWindow ? ui::UserInterfaceIdiom::Phone : ui::UserInterfaceIdiom::Tablet;
+    ui::Screen::setMain(screen);
+}
+
+void WindowPeer::resized(Size size)
+{
+    updateScreen(size);
+    ui::TraitCollection::setApplication(traits(size));
+    if (const auto shown = model())
+        shown->resized(size, traits(size));
+}
+
+void WindowPeer::themeChanged()
+{
+    _measurer->themeDidChange();
+    const auto size = _bin->size();
+    if (size.width > 0)
+        resized(size);
+    _context->themeDidChange();
+}
+
+WindowSize WindowPeer::currentSize() const
+{
+    WindowSize size;
+    gtk_window_get_default_size(window(), &size.width, &size.height);
+    size.isMaximized = gtk_window_is_maximized(window());
+    return size;
+}
+
+void WindowPeer::windowWillPresent(
+    ui::Window&, const ui::Presentation& presentation, ui::TransitionToken token)
+{
+    const LayerSite site{GTK_OVERLAY(_overlay), _bin->widget(), _bin->size()};
+    const bool moves =
+        presentation.animated && _theme->animationsEnabled() && gtk_widget_get_mapped(_overlay);
+    Layer layer{presentation.presented.get(), makeLayer(_context, site, presentation.presented),
+        ObjectRef<GtkWidget>::retain(gtk_window_get_focus(window()))};
+    const auto shown = layer.layer;
+    _layers.push_back(std::move(layer));
+    coverAllButTop();
+    shown->show(moves, [token] { token.finish(); });
+    shown->focus();
+}
+
+/// Without a place to give it back to, nothing has it: not whatever comes first in the window.
+void WindowPeer::giveFocusBack(GtkWidget* before) const
+{
+    const bool isThere =
+        before && gtk_widget_get_root(before) == GTK_ROOT(_window.get()) && gtk_widget_get_mapped(before);
+    if (isThere)
+        gtk_widget_grab_focus(before);
+    else
+        gtk_window_set_focus(window(), nullptr);
+}
+
+void WindowPeer::windowWillDismiss(
+    ui::Window&, const ui::Presentation& presentation, ui::TransitionToken token)
+{
+    const auto found = std::ranges::find(
+        _layers, presentation.presented.get(), [](const Layer& layer) { return layer.screen; });
+    if (found == _layers.end()) {
+        token.finish();
+        return;
+    }
+    const Layer gone = *found;
+    _layers.erase(found);
+    coverAllButTop();
+    giveFocusBack(gone.focusBefore.get());
+    const bool moves =
+        presentation.animated && _theme->animationsEnabled() && gtk_widget_get_mapped(_overlay);
+    _leaving.push_back(gone.layer);
+    gone.layer->hide(moves, [weak = weak_from_this(), layer = std::weak_ptr(gone.layer), token] {
+        if (const auto self = weak.lock())
+            self->layerHasGone(layer.lock());
+        token.finish();
+    });
+}
+
+/// The end comes out of one of the layer's own signals, so it lives until that is over.
+void WindowPeer::layerHasGone(const std::shared_ptr<PresentedLayer>& layer)
+{
+    std::erase(_leaving, layer);
+    _context->scheduler().release(layer);
+}
+
+void WindowPeer::coverAllButTop()
+{
+    auto* root = gtk_overlay_get_child(GTK_OVERLAY(_overlay));
+    const bool covered = !_layers.empty();
+    if (root) {
+        gtk_widget_set_can_focus(root, !covered);
+        gtk_widget_set_can_target(root, !covered);
+        gtk_accessible_update_state(
+            GTK_ACCESSIBLE(root), GTK_ACCESSIBLE_STATE_HIDDEN, covered ? TRUE : FALSE, -1);
+    }
+    for (auto& layer : _layers)
+        layer.layer->setCovered(&layer != &_layers.back());
+}
+
+} // namespace host::gtk

@@ -1,0 +1,94 @@
+#pragma once
+
+#include "host/gtk/base/PangoTextMeasurer.h"
+#include "host/gtk/base/PeerContext.h"
+#include "host/gtk/base/SizedBin.h"
+#include "host/gtk/screens/PresentedLayer.h"
+#include "host/gtk/screens/ScreenPeer.h"
+#include "kit/Window.h"
+
+#include <adwaita.h>
+
+#include <memory>
+#include <vector>
+
+namespace host::gtk {
+
+class PreviewModule;
+
+/// How large the window was when it was last open.
+struct WindowSize {
+    int width = 900, height = 700; ///< points
+    bool isMaximized = false;
+    bool operator==(const WindowSize&) const = default;
+};
+
+/// Shows the application's window: the root screen, and layers over it for what is presented.
+class WindowPeer : public platform::ui::WindowObserver, public std::enable_shared_from_this<WindowPeer> {
+public:
+    /// `application` may be null: the window then stands for itself.
+    static std::shared_ptr<WindowPeer> make(AdwApplication* application,
+        const std::shared_ptr<platform::ui::Window>& window, const WindowSize& size,
+        const std::shared_ptr<PreviewModule>& previews);
+    WindowPeer(AdwApplication* application, const std::shared_ptr<platform::ui::Window>& window,
+        const WindowSize& size, const std::shared_ptr<PreviewModule>& previews);
+    ~WindowPeer() override;
+
+    void show();
+    GtkWindow* window() const { return GTK_WINDOW(_window.get()); }
+    /// Where short messages show: over the root screen, below what is presented.
+    AdwToastOverlay* toasts() const { return _toasts; }
+    const std::shared_ptr<PeerContext>& context() const { return _context; }
+    ScreenPeer* rootPeer() const { return _root.get(); }
+    std::shared_ptr<platform::ui::Window> model() const { return _model.lock(); }
+    WindowSize currentSize() const;
+    /// Called when the window becomes the one that the user works with, or no longer is it.
+    void setOnActive(std::function<void(bool)> callback) { _onActive = std::move(callback); }
+    /// Called before the window's screens disappear because the user closed it.
+    void setOnClosed(std::function<void()> callback) { _onClosed = std::move(callback); }
+
+    static constexpr int minimumWidth = 360, minimumHeight = 294; ///< a phone with its keyboard up
+
+    void rootDidChange(platform::ui::Window& window) override;
+    void windowWillPresent(platform::ui::Window& window, const platform::ui::Presentation& presentation,
+        platform::ui::TransitionToken token) override;
+    void windowWillDismiss(platform::ui::Window& window, const platform::ui::Presentation& presentation,
+        platform::ui::TransitionToken token) override;
+
+private:
+    struct Layer {
+        const platform::ui::ViewController* screen;
+        std::shared_ptr<PresentedLayer> layer;
+        ObjectRef<GtkWidget> focusBefore;
+    };
+    void build(AdwApplication* application, const WindowSize& size);
+    void connectInput();
+    void connectWindow();
+    void showRoot();
+    void resized(platform::Size size);
+    platform::ui::TraitCollection traits(platform::Size size) const;
+    void updateScreen(platform::Size size) const;
+    void themeChanged();
+    void coverAllButTop();
+    void giveFocusBack(GtkWidget* before) const;
+    void layerHasGone(const std::shared_ptr<PresentedLayer>& layer);
+    bool goBack();
+    void closed();
+
+    std::weak_ptr<platform::ui::Window> _model;
+    std::shared_ptr<Theme> _theme;
+    std::shared_ptr<PangoTextMeasurer> _measurer;
+    std::shared_ptr<PeerContext> _context;
+    ObjectRef<GtkWidget> _window;
+    std::unique_ptr<SizedBin> _bin;
+    AdwToastOverlay* _toasts = nullptr;
+    GtkWidget* _overlay = nullptr;
+    std::shared_ptr<ScreenPeer> _root;
+    std::vector<Layer> _layers; ///< the topmost last
+    std::vector<std::shared_ptr<PresentedLayer>> _leaving;
+    std::function<void(bool)> _onActive;
+    std::function<void()> _onClosed;
+    SignalConnections _connections;
+};
+
+} // namespace host::gtk

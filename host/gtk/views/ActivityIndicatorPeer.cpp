@@ -1,0 +1,27 @@
+#include "host/gtk/views/ActivityIndicatorPeer.h"
+
+#include "kit/ActivityIndicator.h"
+
+namespace host::gtk {
+
+namespace ui = platform::ui;
+
+ActivityIndicatorPeer::ActivityIndicatorPeer(
+    std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::ActivityIndicator>& indicator)
+    : ViewPeer(std::move(context), indicator)
+    , _indicator(indicator)
+{
+    setNative(gtk_spinner_new());
+}
+
+void ActivityIndicatorPeer::mirror(ui::View& shown, ui::ViewChanges changes)
+{
+    ViewPeer::mirror(shown, changes);
+    const auto indicator = _indicator.lock();
+    if (!indicator || !changes.contains(ui::ViewChange::Content))
+        return;
+    gtk_widget_set_visible(native(), indicator->isAnimating());
+    gtk_spinner_set_spinning(GTK_SPINNER(native()), indicator->isAnimating());
+}
+
+} // namespace host::gtk

@@ -1,0 +1,30 @@
+#pragma once
+
+#include "host/gtk/base/ViewPeer.h"
+
+namespace platform::ui {
+class Button;
+}
+
+namespace host::gtk {
+
+/// A GtkButton. A button that is shown smaller than a finger still takes what touches 44 points around its
+/// centre.
+class ButtonPeer : public ViewPeer {
+public:
+    ButtonPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::Button>& button);
+
+protected:
+    void mirror(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+
+private:
+    void mirrorContent(const platform::ui::Button& button);
+
+    std::weak_ptr<platform::ui::Button> _button;
+    GtkWidget *_icon, *_title;
+};
+
+/// A GtkButton with the touch area of a ButtonPeer.
+GtkWidget* makeTouchButton();
+
+} // namespace host::gtk

@@ -1,0 +1,31 @@
+#include "host/gtk/views/HostedViewPeer.h"
+
+#include "kit/HostedView.h"
+
+namespace host::gtk {
+
+namespace ui = platform::ui;
+
+HostedViewPeer::HostedViewPeer(
+    std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::HostedView>& hosted)
+    : ViewPeer(std::move(context), hosted)
+    , _hosted(hosted)
+{
+}
+
+void HostedViewPeer::mirror(ui::View& shown, ui::ViewChanges changes)
+{
+    const auto hosted = _hosted.lock();
+    if (hosted && changes.contains(ui::ViewChange::Content)) {
+        const auto* maker = context().hostedViewMaker(hosted->kind());
+        const auto made = maker ? (*maker)(*hosted, native()) : ObjectRef<GtkWidget>();
+        if (made.get() != native()) {
+            setNative(made.get());
+            changes |= ui::ViewChange::Accessibility;
+            gtk_widget_queue_allocate(widget());
+        }
+    }
+    ViewPeer::mirror(shown, changes);
+}
+
+} // namespace host::gtk

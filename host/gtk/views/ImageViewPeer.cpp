@@ -1,0 +1,115 @@
+#include "host/gtk/views/ImageViewPeer.h"
+
+#include "host/gtk/base/ImagePaint.h"
+#include "kit/ImageView.h"
+
+#include <algorithm>
+
+namespace host::gtk {
+
+namespace ui = platform::ui;
+using platform::Rect;
+
+namespace {
+
+GtkContentFit fit(ui::ContentMode mode)
+{
+    switch (mode) {
+    case ui::ContentMode::ScaleToFill:
+        return GTK_CONTENT_FIT_FILL;
+    case ui::ContentMode::AspectFit:
+        return GTK_CONTENT_FIT_CONTAIN;
+    case ui::ContentMode::Center:
+        return GTK_CONTENT_FIT_SCALE_DOWN;
+    }
+    return GTK_CONTENT_FIT_CONTAIN;
+}
+
+Rect placed(const ui::ImageView& view, double width, double height)
+{
+    const auto size = view.image()->size();
+    if (view.contentMode() == ui::ContentMode::ScaleToFill || size.width <= 0 || size.height <= 0)
+        return {0, 0, width, height};
+    double factor = std::min(width / size.width, height / size.height);
+    if (view.contentMode() == ui::ContentMode::Center)
+        factor = std::min(factor, 1.0);
+    const double shownWidth = size.width * factor, shownHeight = size.height * factor;
+    return {(width - shownWidth) / 2, (height - shownHeight) / 2, shownWidth, shownHeight};
+}
+
+GtkWidget* silent(GType type)
+{
+    return GTK_WIDGET(g_object_new(type, "accessible-role", GTK_ACCESSIBLE_ROLE_PRESENTATION, nullptr));
+}
+
+} // namespace
+
+ImageViewPeer::ImageViewPeer(
+    std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::ImageView>& imageView)
+    : ViewPeer(std::move(context), imageView,
+        imageView->accessibility().label.empty() ? GTK_ACCESSIBLE_ROLE_GROUP : GTK_ACCESSIBLE_ROLE_IMG)
+    , _imageView(imageView)
+{
+}
+
+void ImageViewPeer::mirror(ui::View& shown, ui::ViewChanges changes)
+{
+    ViewPeer::mirror(shown, changes);
+    const auto imageView = _imageView.lock();
+    if (imageView
+        && (changes.contains(ui::ViewChange::Content)
+            || (_means == Means::Icon && changes.contains(ui::ViewChange::Frame))))
+        mirrorImage(*imageView);
+}
+
+void ImageViewPeer::mirrorImage(const ui::ImageView& imageView)
+{
+    const auto& image = imageView.image();
+    if (!image) {
+        useMeans(Means::None);
+    } else if (image->isNamed()) {
+        useMeans(Means::Icon);
+        const auto& frame = imageView.frame();
+        ImagePaint::show(
+            GTK_IMAGE(native()), *image, std::max(1, static_cast<int>(std::min(frame.width, frame.height))));
+    } else if (imageView.magnification() == ui::ImageFilter::Nearest) {
+        useMeans(Means::Drawing);
+    } else {
+        useMeans(Means::Picture);
+        gtk_picture_set_content_fit(GTK_PICTURE(native()), fit(imageView.contentMode()));
+        gtk_picture_set_paintable(GTK_PICTURE(native()), ImagePaint::texture(*image).get());
+    }
+    gtk_widget_queue_draw(widget());
+}
+
+void ImageViewPeer::useMeans(Means means)
+{
+    if (means == _means)
+        return;
+    _means = means;
+    GtkWidget* made = nullptr;
+    if (means == Means::Picture) {
+        made = silent(GTK_TYPE_PICTURE);
+        gtk_picture_set_can_shrink(GTK_PICTURE(made), TRUE);
+    } else if (means == Means::Icon) {
+        made = silent(GTK_TYPE_IMAGE);
+    }
+    setNative(made);
+    gtk_widget_queue_allocate(widget());
+}
+
+void ImageViewPeer::canvasSnapshot(GtkSnapshot* snapshot)
+{
+    ViewPeer::canvasSnapshot(snapshot);
+    const auto imageView = _imageView.lock();
+    if (_means != Means::Drawing || !imageView || !imageView->image())
+        return;
+    const double width = gtk_widget_get_width(widget()), height = gtk_widget_get_height(widget());
+    graphene_rect_t bounds;
+    graphene_rect_init(&bounds, 0, 0, static_cast<float>(width), static_cast<float>(height));
+    auto* cairo = gtk_snapshot_append_cairo(snapshot, &bounds);
+    ImagePaint::draw(cairo, *imageView->image(), placed(*imageView, width, height), CAIRO_FILTER_NEAREST);
+    cairo_destroy(cairo);
+}
+
+} // namespace host::gtk

@@ -1,0 +1,32 @@
+#pragma once
+
+#include "host/gtk/base/ViewPeer.h"
+
+namespace platform::ui {
+class ImageView;
+}
+
+namespace host::gtk {
+
+/// A GtkPicture for pixels, a GtkImage for an icon of the theme, the peer's own drawing where pixels are
+/// enlarged without smoothing.
+class ImageViewPeer : public ViewPeer {
+public:
+    ImageViewPeer(
+        std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::ImageView>& imageView);
+
+    void canvasSnapshot(GtkSnapshot* snapshot) override;
+
+protected:
+    void mirror(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+
+private:
+    enum class Means { None, Picture, Icon, Drawing };
+    void mirrorImage(const platform::ui::ImageView& imageView);
+    void useMeans(Means means);
+
+    std::weak_ptr<platform::ui::ImageView> _imageView;
+    Means _means = Means::None;
+};
+
+} // namespace host::gtk

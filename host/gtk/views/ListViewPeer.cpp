@@ -1,0 +1,441 @@
+#include "host/gtk/views/ListViewPeer.h"
+
+#include "host/gtk/base/MenuPopover.h"
+#include "host/gtk/views/ListRowWidget.h"
+#include "host/gtk/views/RowModel.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace host::gtk {
+
+namespace ui = platform::ui;
+using platform::Point;
+
+namespace {
+
+/// The toolkit keeps about this many rows as widgets, whatever the screen shows; more rows cost nothing.
+constexpr std::size_t livingRows = 220;
+/// How many of them are made in one frame, so that a frame stays a frame. The first frame has a page to lay
+/// out as well.
+constexpr std::size_t firstRows = 6, moreRows = 6;
+/// The widgets take so many single changes at once; more are told in one away from what is seen.
+constexpr std::size_t mostSplices = 16;
+constexpr double textMargin =
+    10; ///< points above and below a row's texts, half the distance between them included
+constexpr int layoutFrames = 2; ///< after so many frames new rows have their heights
+constexpr int focusFrames = 4; ///< a row that was scrolled to has its widget after one or two
+
+template <typename Observer, typename Peer>
+std::shared_ptr<Observer> observing(Peer& peer)
+{
+    return std::shared_ptr<Observer>(peer.shared_from_this(), static_cast<Observer*>(&peer));
+}
+
+/// What two lines of text and the margins around them need, which with large text is more than the usual.
+double rowHeightForTexts()
+{
+    const double lines = ui::Font::preferred(ui::TextStyle::Body).lineHeight()
+        + ui::Font::preferred(ui::TextStyle::Footnote).lineHeight();
+    return std::max(ui::ListView::defaultRowHeight, std::ceil(lines + 2 * textMargin));
+}
+
+/// A menu takes the pointer, so that the toolkit never sees the end of the press that opened it: the row
+/// would look pressed until the next one.
+void endPress(GtkWidget* pressed)
+{
+    for (auto* widget = pressed; widget; widget = gtk_widget_get_parent(widget))
+        gtk_widget_unset_state_flags(widget, GTK_STATE_FLAG_ACTIVE);
+}
+
+std::size_t rowCountBefore(const ui::ListView& list, const ui::ListChanges& changes)
+{
+    std::size_t count = list.rowCount();
+    for (const auto& splice : changes.splices)
+        count = count + splice.removed - splice.inserted;
+    return count;
+}
+
+/// Whether a row that stayed shows something else.
+bool showsAnew(const ui::ListChanges& changes, std::size_t row)
+{
+    const auto after = std::ranges::upper_bound(
+        changes.changed, row, {}, [](const ui::RowRange& range) { return range.first; });
+    return after != changes.changed.begin() && std::prev(after)->contains(row);
+}
+
+/// Few enough splices that leave the rows with widgets alone, or at least those that are seen: a row that
+/// goes and comes again has to be filled again.
+std::vector<ui::ListSplice> splicesToTell(const ui::RowRange& visible, const ui::ListChanges& changes)
+{
+    if (changes.splices.size() <= mostSplices)
+        return changes.splices;
+    const auto before = std::min(visible.first, livingRows / 2);
+    auto splices =
+        changes.splicesExactWithin({visible.first - before, before + visible.count + livingRows / 2});
+    return splices.size() <= mostSplices ? splices : changes.splicesExactWithin(visible);
+}
+
+} // namespace
+
+ListViewPeer::ListViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::ListView>& list)
+    : ViewPeer(std::move(context), list)
+    , _list(list)
+    , _rows(RowModel::make())
+{
+    buildWidgets();
+    connectInput();
+}
+
+ListViewPeer::~ListViewPeer()
+{
+    context().scheduler().cancel(&_fillKey);
+    context().scheduler().cancel(&_growKey);
+    context().scheduler().cancel(&_focusKey);
+    context().scheduler().cancel(&_scrollKey);
+    context().scheduler().cancel(&_onScroll);
+    context().scheduler().cancel(&_hasStrayed);
+    _onScroll.disconnect();
+    // The list ends now, while its rows' handlers are still connected to this.
+    gtk_list_view_set_model(GTK_LIST_VIEW(_listWidget), nullptr);
+    gtk_list_view_set_factory(GTK_LIST_VIEW(_listWidget), nullptr);
+}
+
+void ListViewPeer::buildWidgets()
+{
+    auto* factory = gtk_signal_list_item_factory_new();
+    connectFactory(factory);
+    auto* selection = gtk_no_selection_new(G_LIST_MODEL(g_object_ref(_rows.get())));
+    _listWidget = gtk_list_view_new(GTK_SELECTION_MODEL(selection), factory);
+    gtk_list_view_set_single_click_activate(GTK_LIST_VIEW(_listWidget), TRUE);
+    gtk_widget_add_css_class(_listWidget, "kit-list");
+    _window = gtk_scrolled_window_new();
+    // The keyboard goes to what scrolls here, not to its frame.
+    gtk_widget_set_focusable(_window, FALSE);
+    gtk_scrolled_window_set_policy(GTK_SCROLLED_WINDOW(_window), GTK_POLICY_NEVER, GTK_POLICY_AUTOMATIC);
+    gtk_scrolled_window_set_child(GTK_SCROLLED_WINDOW(_window), _listWidget);
+    _spinner = gtk_spinner_new();
+    gtk_widget_add_css_class(_spinner, "refresher");
+    _refresher = gtk_revealer_new();
+    gtk_revealer_set_child(GTK_REVEALER(_refresher), _spinner);
+    gtk_widget_set_valign(_refresher, GTK_ALIGN_START);
+    gtk_widget_set_halign(_refresher, GTK_ALIGN_CENTER);
+    gtk_widget_set_can_target(_refresher, FALSE);
+    auto* overlay = gtk_overlay_new();
+    gtk_overlay_set_child(GTK_OVERLAY(overlay), _window);
+    gtk_overlay_add_overlay(GTK_OVERLAY(overlay), _refresher);
+    setNative(overlay);
+}
+
+void ListViewPeer::connectFactory(GtkListItemFactory* factory)
+{
+    connect(
+        connectSignal<void(GtkListItem*)>(factory, "setup", [this](GtkListItem* item) { setUpRow(item); }));
+    connect(connectSignal<void(GtkListItem*)>(factory, "bind", [this](GtkListItem* item) {
+        _live.insert(item);
+        fillSoon(item);
+    }));
+    connect(connectSignal<void(GtkListItem*)>(factory, "unbind", [this](GtkListItem* item) {
+        _live.erase(item);
+        _unfilled.erase(item);
+    }));
+}
+
+void ListViewPeer::connectInput()
+{
+    connect(
+        connectSignal<void(guint)>(_listWidget, "activate", [this](guint position) { activated(position); }));
+    auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
+    _onScroll = connectSignal<void()>(adjustment, "value-changed", [this] { scrolled(); });
+    connect(connectSignal<void()>(adjustment, "changed", [this] {
+        // Not now: the list is being laid out.
+        context().scheduler().scheduleNextFrame(&_onScroll, [this] { followFingerEvenIfAllIsSeen(); });
+    }));
+    connect(connectSignal<void(GtkPositionType)>(_window, "edge-overshot", [this](GtkPositionType edge) {
+        const auto list = _list.lock();
+        if (list && edge == GTK_POS_TOP && list->isRefreshable() && !list->isRefreshing())
+            list->pulledToRefresh();
+    }));
+    auto* keys = gtk_event_controller_key_new();
+    // Before the list's own keys, of which some mean something else here.
+    gtk_event_controller_set_propagation_phase(keys, GTK_PHASE_CAPTURE);
+    gtk_widget_add_controller(_listWidget, keys);
+    connect(connectSignal<gboolean(guint, guint, GdkModifierType)>(
+        keys, "key-pressed", [this](guint key, guint, GdkModifierType modifiers) -> gboolean {
+            return keyPressed(key, modifiers);
+        }));
+    auto* click = gtk_gesture_click_new();
+    gtk_gesture_single_set_button(GTK_GESTURE_SINGLE(click), GDK_BUTTON_SECONDARY);
+    gtk_widget_add_controller(_listWidget, GTK_EVENT_CONTROLLER(click));
+    connect(connectSignal<void(int, double, double)>(
+        click, "pressed", [this](int, double x, double y) { showMenuOfList(x, y); }));
+    connectMarks();
+    connectStrayingFinger();
+}
+
+void ListViewPeer::setUpRow(GtkListItem* item)
+{
+    const std::weak_ptr<ListViewPeer> peer = std::static_pointer_cast<ListViewPeer>(shared_from_this());
+    using Request = ListRowWidget::Request;
+    auto* row = ListRowWidget::make(item, [peer](GtkWidget* asked, Request request) {
+        const double x = gtk_widget_get_width(asked) / 2.0, y = gtk_widget_get_height(asked) / 2.0;
+        const auto self = peer.lock();
+        if (self && request == Request::Peek)
+            self->held(asked, x, y);
+        else if (self)
+            self->showMenuOf(asked, x, y);
+    });
+    const auto answer = [peer, row](void (ListViewPeer::*show)(GtkWidget*, double, double)) {
+        return [peer, row, show](GtkGesture* gesture, double x, double y) {
+            const auto self = peer.lock();
+            if (!self)
+                return;
+            gtk_gesture_set_state(gesture, GTK_EVENT_SEQUENCE_CLAIMED);
+            (*self.*show)(row, x, y);
+        };
+    };
+    auto* press = gtk_gesture_long_press_new();
+    gtk_widget_add_controller(row, GTK_EVENT_CONTROLLER(press));
+    connectForLife<void(double, double)>(
+        press, "pressed", [peer, hold = answer(&ListViewPeer::held), press](double x, double y) {
+            hold(press, x, y);
+            if (const auto self = peer.lock())
+                self->waitForPressOn();
+        });
+    connectForLife<void(GdkEventSequence*)>(press, "end", [peer](GdkEventSequence*) {
+        if (const auto self = peer.lock())
+            ++self->_holds;
+    });
+    auto* click = gtk_gesture_click_new();
+    gtk_gesture_single_set_button(GTK_GESTURE_SINGLE(click), GDK_BUTTON_SECONDARY);
+    gtk_widget_add_controller(row, GTK_EVENT_CONTROLLER(click));
+    connectForLife<void(int, double, double)>(click, "pressed",
+        [menu = answer(&ListViewPeer::showMenuOf), click](int, double x, double y) { menu(click, x, y); });
+    gtk_list_item_set_child(item, row);
+}
+
+void ListViewPeer::activated(guint position)
+{
+    const auto list = _list.lock();
+    if (!list || _hasStrayed)
+        return;
+    const auto keepsSelf = shared_from_this();
+    if (list->selectionMode() == ui::SelectionMode::Multiple && isShiftHeld())
+        list->extendSelectionTo(position);
+    else
+        list->activateRow(position);
+}
+
+void ListViewPeer::scrolled()
+{
+    const auto list = _list.lock();
+    if (!list)
+        return;
+    const double top = list->contentInsets().top;
+    auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
+    list->userScrolled({0, gtk_adjustment_get_value(adjustment) - top});
+    fillSeenRows();
+}
+
+void ListViewPeer::showMenuOf(GtkWidget* row, double x, double y)
+{
+    // A row that gets the keyboard back now would take it from the menu, and so close it.
+    context().scheduler().cancel(&_focusKey);
+    const auto list = _list.lock();
+    if (!list)
+        return;
+    // On the list rather than on the row, whose widget may be given to another row while the menu is open.
+    double listX = x, listY = y;
+    gtk_widget_translate_coordinates(row, widget(), x, y, &listX, &listY);
+    endPress(row);
+    showMenu(widget(), listX, listY, list->menuForRow(ListRowWidget::position(row)));
+}
+
+void ListViewPeer::showMenuOfList(double x, double y)
+{
+    const auto list = _list.lock();
+    double listX = x, listY = y;
+    gtk_widget_translate_coordinates(_listWidget, widget(), x, y, &listX, &listY);
+    if (list)
+        showMenu(widget(), listX, listY, list->menuForList());
+}
+
+bool ListViewPeer::grabFocus()
+{
+    return gtk_widget_grab_focus(_listWidget);
+}
+
+void ListViewPeer::mirror(ui::View& shown, ui::ViewChanges changes)
+{
+    ViewPeer::mirror(shown, changes);
+    const auto list = _list.lock();
+    if (!list || !changes.contains(ui::ViewChange::Content))
+        return;
+    if (const double height = rowHeightForTexts(); height != list->rowHeight())
+        list->setRowHeight(height);
+    list->setScrollObserver(observing<ui::ScrollObserver>(*this));
+    list->setListObserver(observing<ui::ListViewObserver>(*this));
+    showRows(list->rowCount());
+    fillAllSoon();
+    refreshStateDidChange(*list);
+}
+
+void ListViewPeer::showRows(std::size_t count)
+{
+    const std::size_t known = g_list_model_get_n_items(_rows.get());
+    if (known == count)
+        return;
+    // A list that is far enough is complete at once; one that begins grows into its rows.
+    const auto next =
+        known >= livingRows || count <= firstRows ? count : std::min(count, std::max(known, firstRows));
+    const auto kept = std::min(known, next);
+    RowModel::splice(_rows.get(), static_cast<guint>(kept), static_cast<guint>(known - kept),
+        static_cast<guint>(next - kept));
+    if (next < count)
+        context().scheduler().scheduleNextFrame(&_growKey, [this] { growRows(); });
+}
+
+void ListViewPeer::growRows()
+{
+    const auto list = _list.lock();
+    const std::size_t known = g_list_model_get_n_items(_rows.get());
+    if (!list || known >= list->rowCount())
+        return;
+    const auto next = known >= livingRows ? list->rowCount() : std::min(list->rowCount(), known + moreRows);
+    RowModel::splice(_rows.get(), static_cast<guint>(known), 0, static_cast<guint>(next - known));
+    if (next < list->rowCount())
+        context().scheduler().scheduleNextFrame(&_growKey, [this] { growRows(); });
+}
+
+void ListViewPeer::rowsWereReset(ui::ListView& list)
+{
+    auto* focused = focusedRow();
+    const auto focusedAt = focused ? std::optional(ListRowWidget::position(focused)) : std::nullopt;
+    RowModel::reset(_rows.get(), 0);
+    showRows(list.rowCount());
+    fillAllSoon();
+    if (focusedAt && list.rowCount() > 0)
+        focusSoon(std::min<std::size_t>(*focusedAt, list.rowCount() - 1), focusFrames);
+}
+
+void ListViewPeer::rowsDidChange(ui::ListView& list, const ui::ListChanges& changes)
+{
+    auto* focused = focusedRow();
+    const auto focusedAt = focused ? std::optional(ListRowWidget::position(focused)) : std::nullopt;
+    // A list that still grows shows its beginning only: its rows are read anew instead.
+    if (g_list_model_get_n_items(_rows.get()) == rowCountBefore(list, changes))
+        splice(list, changes);
+    else
+        fillAllSoon();
+    showRows(list.rowCount());
+    // The row that had the keyboard is gone: the one that came to its place has it now.
+    if (focusedAt && !focusedRow() && list.rowCount() > 0)
+        focusSoon(std::min<std::size_t>(*focusedAt, list.rowCount() - 1), focusFrames);
+}
+
+void ListViewPeer::splice(const ui::ListView& list, const ui::ListChanges& changes)
+{
+    _isSplicing = true;
+    for (const auto& splice : splicesToTell(list.visibleRows(), changes)) {
+        const auto leaving = rowObjects({splice.position, splice.removed});
+        RowModel::splice(_rows.get(), static_cast<guint>(splice.position), static_cast<guint>(splice.removed),
+            static_cast<guint>(splice.inserted), leaving);
+    }
+    _isSplicing = false;
+    for (auto* item : _live) {
+        if (showsAnew(changes, gtk_list_item_get_position(item)))
+            _unfilled.insert(item);
+    }
+    if (!_unfilled.empty())
+        fillLater();
+}
+
+/// The objects of the rows in a range that have widgets.
+std::vector<ObjectRef<GObject>> ListViewPeer::rowObjects(const ui::RowRange& range) const
+{
+    std::vector<ObjectRef<GObject>> objects;
+    for (auto* item : _live) {
+        if (range.contains(gtk_list_item_get_position(item)))
+            objects.push_back(ObjectRef<GObject>::retain(G_OBJECT(gtk_list_item_get_item(item))));
+    }
+    return objects;
+}
+
+void ListViewPeer::rowDidChange(ui::ListView&, std::size_t index)
+{
+    for (auto* item : _live) {
+        if (gtk_list_item_get_position(item) == index)
+            _unfilled.insert(item);
+    }
+    fillLater();
+}
+
+void ListViewPeer::selectionDidChange(ui::ListView&)
+{
+    fillAllSoon();
+}
+
+void ListViewPeer::scrollTo(ui::ScrollView& view, Point offset, bool /*animated*/)
+{
+    moveTo(offset.y + view.contentInsets().top, layoutFrames);
+}
+
+void ListViewPeer::moveTo(double value, int frames)
+{
+    const auto list = _list.lock();
+    auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
+    const double end = value + gtk_adjustment_get_page_size(adjustment);
+    const bool isKnown = end <= gtk_adjustment_get_upper(adjustment);
+    if (!list || value <= 0 || isKnown || frames == 0) {
+        const SignalBlock block(_onScroll);
+        gtk_adjustment_set_value(adjustment, value);
+        return;
+    }
+    // The widgets have no height for rows that they have not laid out yet, nor a place among them.
+    RowModel::complete(_rows.get(), static_cast<guint>(list->rowCount()));
+    context().scheduler().scheduleNextFrame(
+        &_scrollKey, [this, value, frames] { moveTo(value, frames - 1); });
+}
+
+void ListViewPeer::scrollExtentDidChange(ui::ScrollView&) { }
+
+void ListViewPeer::scrollToRow(
+    ui::ListView& list, std::size_t index, ui::RowPosition position, bool /*animated*/)
+{
+    auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
+    const double page = gtk_adjustment_get_page_size(adjustment), height = list.rowHeight();
+    const double top = static_cast<double>(index) * height, now = gtk_adjustment_get_value(adjustment);
+    double wanted = std::clamp(now, top + height - page, top);
+    if (position == ui::RowPosition::Top)
+        wanted = top;
+    else if (position == ui::RowPosition::Middle)
+        wanted = top - (page - height) / 2;
+    moveTo(std::max(0.0, wanted), layoutFrames);
+}
+
+void ListViewPeer::focusRow(ui::ListView&, std::size_t index)
+{
+    focusSoon(index, focusFrames);
+}
+
+void ListViewPeer::focusSoon(std::size_t index, int frames)
+{
+    for (auto* item : _live) {
+        auto* place = gtk_widget_get_parent(gtk_list_item_get_child(item));
+        if (gtk_list_item_get_position(item) == index && place && gtk_widget_get_mapped(place)) {
+            gtk_widget_grab_focus(place);
+            return;
+        }
+    }
+    if (frames > 0)
+        context().scheduler().scheduleNextFrame(
+            &_focusKey, [this, index, frames] { focusSoon(index, frames - 1); });
+}
+
+void ListViewPeer::refreshStateDidChange(ui::ListView& list)
+{
+    gtk_spinner_set_spinning(GTK_SPINNER(_spinner), list.isRefreshing());
+    gtk_revealer_set_reveal_child(GTK_REVEALER(_refresher), list.isRefreshing());
+}
+
+} // namespace host::gtk

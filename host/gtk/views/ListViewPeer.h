@@ -1,0 +1,104 @@
+#pragma once
+
+#include "host/gtk/base/ViewPeer.h"
+#include "kit/ListView.h"
+#include "kit/TypeAhead.h"
+
+#include <optional>
+#include <unordered_set>
+
+namespace host::gtk {
+
+/// A GtkListView over a lazy model: only rows near the visible ones have widgets.
+class ListViewPeer : public ViewPeer,
+                     public platform::ui::ScrollObserver,
+                     public platform::ui::ListViewObserver {
+public:
+    ListViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::ListView>& list);
+    ~ListViewPeer() override;
+
+    void scrollTo(platform::ui::ScrollView& view, platform::Point offset, bool animated) override;
+    void scrollExtentDidChange(platform::ui::ScrollView& view) override;
+    void rowsWereReset(platform::ui::ListView& list) override;
+    void rowsDidChange(platform::ui::ListView& list, const platform::ui::ListChanges& changes) override;
+    void rowDidChange(platform::ui::ListView& list, std::size_t index) override;
+    void selectionDidChange(platform::ui::ListView& list) override;
+    void scrollToRow(platform::ui::ListView& list, std::size_t index, platform::ui::RowPosition position,
+        bool animated) override;
+    void focusRow(platform::ui::ListView& list, std::size_t index) override;
+    void refreshStateDidChange(platform::ui::ListView& list) override;
+
+    bool grabFocus() override;
+    GtkWidget* listWidget() const { return _listWidget; }
+    /// The widgets of the rows that exist now, in no order.
+    std::vector<GtkWidget*> liveRows() const;
+
+protected:
+    GtkWidget* spoken() const override { return _listWidget; }
+    GtkWidget* childContainer() const override { return widget(); }
+    platform::Point childOrigin() const override { return {}; }
+    void mirror(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+
+private:
+    void buildWidgets();
+    void connectFactory(GtkListItemFactory* factory);
+    void connectInput();
+    void connectMarks();
+    void connectStrayingFinger();
+    void followFinger(GdkEvent* event);
+    void setUpRow(GtkListItem* item);
+    void bindRow(GtkListItem* item);
+    void activated(guint position);
+    void scrolled();
+    void followFingerEvenIfAllIsSeen();
+    /// Lets the widgets know of as many rows as a frame can make widgets for, and of more in the next frames.
+    void showRows(std::size_t count);
+    void growRows();
+    std::vector<ObjectRef<GObject>> rowObjects(const platform::ui::RowRange& range) const;
+    void splice(const platform::ui::ListView& list, const platform::ui::ListChanges& changes);
+    /// Scrolls, at the latest after so many frames.
+    void moveTo(double value, int frames);
+    /// Rows that are seen are filled at once, those beside them a few in each frame.
+    void fillSoon(GtkListItem* item);
+    void fillAllSoon();
+    void fillLater();
+    void fillRows();
+    void fillSeenRows();
+    std::vector<GtkListItem*> unfilledBesideSeen() const;
+    void showMenuOf(GtkWidget* row, double x, double y);
+    void showMenuOfList(double x, double y);
+    void held(GtkWidget* row, double x, double y);
+    void waitForPressOn();
+
+    // The keyboard.
+    bool keyPressed(guint key, GdkModifierType modifiers);
+    bool leaveByTab(GtkDirectionType direction);
+    bool rowKeyPressed(std::size_t row, guint key, GdkModifierType modifiers);
+    bool listKeyPressed(guint key, GdkModifierType modifiers);
+    bool extendByKey(std::size_t from, guint key);
+    bool typedAhead(guint key, GdkModifierType modifiers);
+    bool isShiftHeld() const;
+    GtkWidget* focusedRow() const;
+    GtkWidget* rowAt(double x, double y) const;
+    /// Gives the keyboard to a row as soon as it has a widget.
+    void focusSoon(std::size_t index, int frames);
+
+    std::weak_ptr<platform::ui::ListView> _list;
+    ObjectRef<GListModel> _rows;
+    GtkWidget *_listWidget = nullptr, *_window = nullptr, *_refresher = nullptr, *_spinner = nullptr;
+    std::unordered_set<GtkListItem*> _live;
+    std::unordered_set<GtkListItem*> _unfilled; ///< of those, the ones that do not show their rows yet
+    bool _isSplicing = false; ///< rows are not at their final places
+    SignalConnection _onScroll;
+    platform::ui::TypeAhead _typeAhead;
+    platform::Point _fingerStart; ///< where the first came down
+    int _fingers = 0; ///< that are down
+    bool _hasStrayed = false; ///< they open no row
+    int _holds = 0; ///< counts the fingers that held a row, so that an earlier one does not press on
+    int _focusKey = 0; ///< its address names the focusing of a row in the scheduler
+    int _scrollKey = 0; ///< its address names the second step of a scrolling in the scheduler
+    int _growKey = 0; ///< its address names the growing of the list in the scheduler
+    int _fillKey = 0; ///< its address names the filling of rows in the scheduler
+};
+
+} // namespace host::gtk

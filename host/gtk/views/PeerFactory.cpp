@@ -1,0 +1,64 @@
+#include "host/gtk/base/ViewPeer.h"
+#include "host/gtk/views/ActivityIndicatorPeer.h"
+#include "host/gtk/views/ButtonPeer.h"
+#include "host/gtk/views/HostedViewPeer.h"
+#include "host/gtk/views/ImageViewPeer.h"
+#include "host/gtk/views/LabelPeer.h"
+#include "host/gtk/views/ListViewPeer.h"
+#include "host/gtk/views/ScrollViewPeer.h"
+#include "host/gtk/views/TextFieldPeer.h"
+#include "kit/ActivityIndicator.h"
+#include "kit/Button.h"
+#include "kit/HostedView.h"
+#include "kit/ImageView.h"
+#include "kit/ListView.h"
+#include "kit/TextField.h"
+#include "kit/ViewVisitor.h"
+
+namespace host::gtk {
+
+namespace ui = platform::ui;
+
+namespace {
+
+class PeerFactory : public ui::ViewVisitor {
+public:
+    explicit PeerFactory(const std::shared_ptr<PeerContext>& context)
+        : _context(context)
+    {
+    }
+
+    void visit(ui::View& view) override { make<ViewPeer>(view); }
+    void visit(ui::Label& view) override { make<LabelPeer>(view); }
+    void visit(ui::ImageView& view) override { make<ImageViewPeer>(view); }
+    void visit(ui::Button& view) override { make<ButtonPeer>(view); }
+    void visit(ui::TextField& view) override { make<TextFieldPeer>(view); }
+    void visit(ui::ScrollView& view) override { make<ScrollViewPeer>(view); }
+    void visit(ui::ListView& view) override { make<ListViewPeer>(view); }
+    void visit(ui::ActivityIndicator& view) override { make<ActivityIndicatorPeer>(view); }
+    void visit(ui::HostedView& view) override { make<HostedViewPeer>(view); }
+
+    std::shared_ptr<ViewPeer> peer;
+
+private:
+    template <typename Peer, typename Model>
+    void make(Model& view)
+    {
+        peer = std::make_shared<Peer>(_context, std::static_pointer_cast<Model>(view.shared_from_this()));
+    }
+
+    const std::shared_ptr<PeerContext>& _context;
+};
+
+} // namespace
+
+std::shared_ptr<ViewPeer> makePeer(
+    const std::shared_ptr<PeerContext>& context, const std::shared_ptr<ui::View>& view)
+{
+    PeerFactory factory(context);
+    view->accept(factory);
+    factory.peer->start();
+    return factory.peer;
+}
+
+} // namespace host::gtk

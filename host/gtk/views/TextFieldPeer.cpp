@@ -1,0 +1,166 @@
+#include "host/gtk/views/TextFieldPeer.h"
+
+#include "host/gtk/base/TextLayout.h"
+#include "kit/TextField.h"
+
+#include <algorithm>
+
+namespace host::gtk {
+
+namespace ui = platform::ui;
+
+namespace {
+
+ui::TextRange selectionOf(GtkEditable* editable)
+{
+    int start = 0, end = 0;
+    if (!gtk_editable_get_selection_bounds(editable, &start, &end))
+        start = end = gtk_editable_get_position(editable);
+    return {static_cast<std::size_t>(start), static_cast<std::size_t>(end - start)};
+}
+
+GtkInputHints hints(const ui::TextInputTraits& traits)
+{
+    int hints = GTK_INPUT_HINT_NONE;
+    if (traits.autocorrection == ui::Autocorrection::Off)
+        hints |= GTK_INPUT_HINT_NO_SPELLCHECK;
+    if (traits.capitalization == ui::Capitalization::Words)
+        hints |= GTK_INPUT_HINT_UPPERCASE_WORDS;
+    else if (traits.capitalization == ui::Capitalization::Sentences)
+        hints |= GTK_INPUT_HINT_UPPERCASE_SENTENCES;
+    return static_cast<GtkInputHints>(hints);
+}
+
+} // namespace
+
+TextFieldPeer::TextFieldPeer(
+    std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::TextField>& field)
+    : ViewPeer(std::move(context), field)
+    , _field(field)
+{
+    auto* entry = gtk_entry_new();
+    gtk_editable_set_width_chars(GTK_EDITABLE(entry), 1);
+    setNative(entry);
+    connectEvents();
+}
+
+void TextFieldPeer::connectEvents()
+{
+    auto* entry = native();
+    _onChanged = connectSignal<void()>(entry, "changed", [this] { edited(); });
+    _onCursor = connectNotify(entry, "notify::cursor-position", [this] { selectionMoved(); });
+    _onBound = connectNotify(entry, "notify::selection-bound", [this] { selectionMoved(); });
+    connect(connectSignal<void()>(entry, "activate", [this] { returnPressed(); }));
+    connect(connectSignal<void(GtkEntryIconPosition)>(entry, "icon-release",
+        [entry](GtkEntryIconPosition) { gtk_editable_set_text(GTK_EDITABLE(entry), ""); }));
+    auto* focus = gtk_event_controller_focus_new();
+    gtk_widget_add_controller(entry, focus);
+    connect(connectSignal<void()>(focus, "enter", [weak = _field] {
+        if (const auto field = weak.lock())
+            field->userFocused();
+    }));
+    connect(connectSignal<void()>(focus, "leave", [weak = _field] {
+        if (const auto field = weak.lock())
+            field->userLeft();
+    }));
+}
+
+void TextFieldPeer::edited()
+{
+    const auto keepsSelf = shared_from_this();
+    const auto field = _field.lock();
+    if (!field)
+        return;
+    auto* editable = GTK_EDITABLE(native());
+    if (!field->userEdited(gtk_editable_get_text(editable), selectionOf(editable)))
+        showAnew();
+    mirrorClearButton(*field);
+}
+
+void TextFieldPeer::selectionMoved()
+{
+    const auto field = _field.lock();
+    auto* editable = GTK_EDITABLE(native());
+    // While an edit goes on, the entry moves its caret before it tells of the new text.
+    if (field && field->text() == gtk_editable_get_text(editable))
+        field->userSelected(selectionOf(editable));
+}
+
+void TextFieldPeer::returnPressed()
+{
+    const auto keepsSelf = shared_from_this();
+    const auto field = _field.lock();
+    if (field && field->userPressedReturn() && _onReturn)
+        _onReturn();
+}
+
+void TextFieldPeer::mirror(ui::View& shown, ui::ViewChanges changes)
+{
+    ViewPeer::mirror(shown, changes);
+    const auto field = _field.lock();
+    if (!field)
+        return;
+    if (changes.contains(ui::ViewChange::Content))
+        mirrorContent(*field);
+    if (changes.contains(ui::ViewChange::Content) || changes.contains(ui::ViewChange::Selection))
+        mirrorText(*field);
+}
+
+void TextFieldPeer::mirrorContent(const ui::TextField& field)
+{
+    auto* entry = GTK_ENTRY(native());
+    const auto& traits = field.inputTraits();
+    gtk_entry_set_placeholder_text(entry, field.placeholder().c_str());
+    gtk_entry_set_input_hints(entry, hints(traits));
+    gtk_entry_set_attributes(entry, TextLayout::attributes(context().theme(), field.font(), nullptr).get());
+    mirrorClearButton(field);
+    gtk_editable_set_alignment(
+        GTK_EDITABLE(entry), field.alignment() == ui::TextAlignment::Center ? 0.5F : 0.0F);
+    const auto& label = field.accessibility().label;
+    const auto& name = label.empty() ? field.placeholder() : label;
+    if (!name.empty())
+        setAccessibleName(name);
+}
+
+void TextFieldPeer::mirrorClearButton(const ui::TextField& field)
+{
+    const bool clears =
+        field.inputTraits().clearButton == ui::ClearButton::WhileEditing && !field.text().empty();
+    gtk_entry_set_icon_from_icon_name(
+        GTK_ENTRY(native()), GTK_ENTRY_ICON_SECONDARY, clears ? "edit-clear-symbolic" : nullptr);
+}
+
+void TextFieldPeer::setAccessibleName(const std::string& name)
+{
+    gtk_accessible_update_property(GTK_ACCESSIBLE(native()), GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
+}
+
+void TextFieldPeer::mirrorText(const ui::TextField& field)
+{
+    const SignalBlock changed(_onChanged), cursor(_onCursor), bound(_onBound);
+    auto* editable = GTK_EDITABLE(native());
+    if (field.text() != gtk_editable_get_text(editable))
+        gtk_editable_set_text(editable, field.text().c_str());
+    const auto range = field.selectedRange();
+    if (!(range == selectionOf(editable)))
+        gtk_editable_select_region(
+            editable, static_cast<int>(range.location), static_cast<int>(range.location + range.length));
+}
+
+bool TextFieldPeer::grabFocus()
+{
+    auto* text = gtk_editable_get_delegate(GTK_EDITABLE(native()));
+    const bool taken = gtk_text_grab_focus_without_selecting(GTK_TEXT(text));
+    if (const auto field = _field.lock())
+        mirrorText(*field);
+    return taken;
+}
+
+std::optional<platform::Size> TextFieldPeer::nativeSize(const ui::View&, double /*maxWidth*/)
+{
+    int height = 0;
+    gtk_widget_measure(native(), GTK_ORIENTATION_VERTICAL, -1, nullptr, &height, nullptr, nullptr);
+    return platform::Size{ui::View::noIntrinsicMetric, static_cast<double>(height)};
+}
+
+} // namespace host::gtk

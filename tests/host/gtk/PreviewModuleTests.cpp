@@ -1,0 +1,81 @@
+#include "WindowFixture.h"
+#include "host/gtk/preview/PrintablePages.h"
+#include "host/system/queues/GLibDispatch.h"
+#include "platform/NotificationCenter.h"
+#include "platform/Services.h"
+#include "screens/preview/PreviewMediaView.h"
+#include "screens/preview/PreviewTextView.h"
+#include "tests/support/PlainTexts.h"
+#include "tests/support/SimplePdf.h"
+#include "tests/support/TemporaryDirectory.h"
+
+#include <filesystem>
+
+namespace {
+
+using host::gtk::PreviewModule;
+using platform::components::PreviewMediaView;
+using platform::components::PreviewTextView;
+using platform::components::PreviewView;
+
+struct BadModule {
+    const char* name;
+    const char* contentOf; ///< a file whose content the module has; empty: there is none
+};
+
+void PrintTo(const BadModule& row, std::ostream* stream)
+{
+    *stream << row.name;
+}
+
+class MissingPreviews : public testing_support::WindowFixture,
+                        public ::testing::WithParamInterface<BadModule> {
+protected:
+    MissingPreviews()
+    {
+        platform::ServiceSet set;
+        set.dispatch = std::make_shared<host::system::GLibDispatch>();
+        set.localization = std::make_shared<testing_support::PlainTexts>();
+        set.notificationCenter = std::make_shared<platform::NotificationCenter>();
+        platform::installServices(std::move(set));
+        if (*GetParam().contentOf)
+            std::filesystem::copy_file(GetParam().contentOf, folder.at("previews.so"));
+        previews = PreviewModule::inFile(folder.at("previews.so"));
+        host = std::make_shared<host::gtk::GtkWindowHost>(
+            nullptr, host::gtk::WindowSize{400, 700, false}, previews);
+        platform::ui::WindowHost::install(host);
+    }
+    std::string wordsOf(const std::shared_ptr<PreviewView>& view)
+    {
+        std::string words;
+        view->setOnFailure([&words](const std::string& said) { words = said; });
+        const auto screen = testing_support::makeScreen("Preview");
+        screen->setView(view);
+        show(screen);
+        waitFor([&] { return !words.empty(); }, "what is missing");
+        return words;
+    }
+
+    testing_support::TemporaryDirectory folder;
+    std::shared_ptr<PreviewModule> previews;
+};
+
+TEST_P(MissingPreviews, AreSaidToBeMissing)
+{
+    const auto path = folder.write("One.pdf", testing_support::simplePdf({"one"}));
+    const auto opened = previews->open(path);
+    ASSERT_TRUE(opened.error);
+    EXPECT_EQ(opened.error->text(platform::errorKey::localizedDescription), PreviewModule::missingWords());
+    EXPECT_EQ(host::gtk::readPrintablePages(path, host::gtk::PrintableKind::Pdf, *previews)
+                  .error->text(platform::errorKey::localizedDescription),
+        PreviewModule::missingWords());
+    EXPECT_EQ(wordsOf(std::make_shared<PreviewTextView>()), PreviewModule::missingWords());
+    EXPECT_EQ(wordsOf(std::make_shared<PreviewMediaView>()), PreviewModule::missingWords());
+}
+
+INSTANTIATE_TEST_SUITE_P(Modules, MissingPreviews,
+    ::testing::Values(BadModule{"NoFile", ""}, BadModule{"NoModule", "/etc/passwd"},
+        BadModule{"AnotherModule", TRW_ANOTHER_MODULE}),
+    [](const auto& row) { return row.param.name; });
+
+} // namespace

@@ -1,0 +1,392 @@
+#include "WindowFixture.h"
+#include "host/gtk/views/ListRowWidget.h"
+#include "host/gtk/views/ListViewPeer.h"
+#include "kit/AlertController.h"
+#include "kit/ListView.h"
+#include "kit/NavigationItem.h"
+#include "kit/TextField.h"
+
+#include <gmock/gmock.h>
+
+#include <map>
+#include <numeric>
+
+namespace {
+
+namespace ui = platform::ui;
+using ::testing::ElementsAre;
+using testing_support::makeScreen;
+
+class NavigationTests : public testing_support::WindowFixture {
+protected:
+    host::gtk::NavigationPeer& navigationPeer() const
+    {
+        return dynamic_cast<host::gtk::NavigationPeer&>(*peer().rootPeer());
+    }
+    GtkWidget* backButton() const { return navigationPeer().topPage()->navigationBar().backButton(); }
+};
+
+TEST_F(NavigationTests, TheShownPageIsTheTopScreen)
+{
+    const auto first = makeScreen("First"), second = makeScreen("Second"), third = makeScreen("Third");
+    const auto stack = showStack({first});
+    const auto shownTitle = [&] { return navigationPeer().topPage()->screen()->title(); };
+    const auto visible = [&] { return adw_leaflet_get_visible_child(navigationPeer().leaflet()); };
+    EXPECT_FALSE(gtk_widget_get_visible(backButton()));
+
+    for (const bool animated : {false, true}) {
+        g_object_set(gtk_settings_get_default(), "gtk-enable-animations", animated, nullptr);
+        stack->pushViewController(second, animated);
+        waitFor([&] { return !stack->isTransitioning(); }, "the push");
+        settle();
+        EXPECT_EQ(shownTitle(), "Second");
+        EXPECT_EQ(visible(), navigationPeer().topPage()->widget());
+        EXPECT_TRUE(gtk_widget_get_visible(backButton()));
+        EXPECT_EQ(second->appearanceState(), ui::AppearanceState::Appeared);
+
+        g_signal_emit_by_name(backButton(), "clicked");
+        waitFor([&] { return !stack->isTransitioning(); }, "the pop");
+        settle();
+        EXPECT_EQ(stack->topViewController(), first);
+        EXPECT_EQ(visible(), navigationPeer().topPage()->widget());
+        EXPECT_EQ(second->appearanceState(), ui::AppearanceState::Disappeared);
+    }
+    stack->setViewControllers({third, second, first}, true);
+    settle();
+    EXPECT_EQ(shownTitle(), "First");
+    EXPECT_EQ(visible(), navigationPeer().topPage()->widget());
+}
+
+TEST_F(NavigationTests, ASwipeTakesTheModelAlong)
+{
+    const auto first = makeScreen("First"), second = makeScreen("Second");
+    const auto stack = showStack({first, second});
+    // What a swipe does: the leaflet goes back by itself.
+    EXPECT_TRUE(adw_leaflet_navigate(navigationPeer().leaflet(), ADW_NAVIGATION_DIRECTION_BACK));
+    settle();
+    EXPECT_EQ(stack->topViewController(), first);
+    EXPECT_TRUE(first->isViewLoaded());
+    EXPECT_EQ(peerOf(*first->view())->widget(),
+        gtk_widget_get_next_sibling(navigationPeer().topPage()->navigationBar().widget()));
+}
+
+TEST_F(NavigationTests, BarsFollowTheScreen)
+{
+    const auto screen = makeScreen("One");
+    int presses = 0;
+    const auto item = std::make_shared<ui::BarButtonItem>("Select", [&](const auto&) { ++presses; });
+    const auto stack = showStack({screen});
+    screen->navigationItem().setRightItem(item);
+    screen->setToolbarItems({std::make_shared<ui::BarButtonItem>(ui::SystemItem::FlexibleSpace),
+        std::make_shared<ui::BarButtonItem>("Move", [&](const auto&) { presses += 10; })});
+    stack->setToolbarHidden(false);
+    settle();
+    ASSERT_TRUE(findButton("Select") && findButton("Move"));
+    g_signal_emit_by_name(findButton("Select"), "clicked");
+    g_signal_emit_by_name(findButton("Move"), "clicked");
+    EXPECT_EQ(presses, 11);
+
+    item->setEnabled(false);
+    settle();
+    EXPECT_FALSE(gtk_widget_is_sensitive(findButton("Select")));
+    screen->navigationItem().setRightItem(nullptr);
+    settle();
+    EXPECT_EQ(findButton("Select"), nullptr);
+}
+
+class AlertTests : public testing_support::WindowFixture {
+protected:
+    void present(const std::shared_ptr<ui::AlertController>& alert)
+    {
+        root = makeScreen("Root");
+        show(root);
+        root->presentViewController(alert, true);
+        settle();
+    }
+    std::shared_ptr<ui::ViewController> root;
+};
+
+TEST_F(AlertTests, AnAlertMayRefuseToClose)
+{
+    const auto alert =
+        std::make_shared<ui::AlertController>("New Folder", "Enter a name.", ui::AlertStyle::Alert);
+    alert->addTextField([](ui::TextField& field) { field.setPlaceholder("Name"); });
+    const auto create = std::make_shared<ui::AlertAction>("Create", ui::AlertActionStyle::Default);
+    bool mayClose = false;
+    create->setShouldClose([&] { return mayClose; });
+    alert->addAction(std::make_shared<ui::AlertAction>("Cancel", ui::AlertActionStyle::Cancel));
+    alert->addAction(create);
+    present(alert);
+
+    const auto& field = alert->textFields().front();
+    auto* entry = nativeOf(*field);
+    EXPECT_TRUE(gtk_widget_has_focus(GTK_WIDGET(gtk_editable_get_delegate(GTK_EDITABLE(entry)))));
+    EXPECT_TRUE(field->isEditing());
+    EXPECT_GE(gtk_widget_get_height(peerOf(*field)->widget()), 44);
+    gtk_editable_set_text(GTK_EDITABLE(entry), "Plans");
+    EXPECT_EQ(field->text(), "Plans");
+    // What lies below takes no focus while the alert stands.
+    EXPECT_FALSE(gtk_widget_grab_focus(peer().rootPeer()->widget()));
+
+    create->setEnabled(false);
+    settle();
+    EXPECT_FALSE(gtk_widget_is_sensitive(findButton("Create")));
+    create->setEnabled(true);
+    settle();
+    g_signal_emit_by_name(findButton("Create"), "clicked");
+    settle();
+    EXPECT_EQ(root->presentedViewController(), alert);
+    mayClose = true;
+    g_signal_emit_by_name(findButton("Create"), "clicked");
+    settle();
+    EXPECT_EQ(root->presentedViewController(), nullptr);
+    EXPECT_EQ(findButton("Create"), nullptr);
+}
+
+TEST_F(AlertTests, EscapeCancelsAndAnimationsEnd)
+{
+    g_object_set(gtk_settings_get_default(), "gtk-enable-animations", TRUE, nullptr);
+    for (const auto style : {ui::AlertStyle::Alert, ui::AlertStyle::ActionSheet}) {
+        int cancelled = 0;
+        const auto alert = std::make_shared<ui::AlertController>("Delete?", "", style);
+        alert->addAction(std::make_shared<ui::AlertAction>("Delete", ui::AlertActionStyle::Destructive));
+        alert->addAction(std::make_shared<ui::AlertAction>(
+            "Cancel", ui::AlertActionStyle::Cancel, [&](const auto&) { ++cancelled; }));
+        present(alert);
+        EXPECT_TRUE(window->backRequested());
+        waitFor([&] { return cancelled == 1; }, "the cancel action");
+        settle();
+        EXPECT_EQ(findButton("Delete"), nullptr);
+    }
+}
+
+TEST_F(AlertTests, TheKeyboardGoesThroughAnAlertAndBack)
+{
+    root = makeScreen("Root");
+    const auto below = std::make_shared<ui::TextField>("below");
+    below->setFrame({20, 20, 200, 50});
+    root->view()->addSubview(below);
+    show(root);
+    below->becomeFirstResponder();
+    settle();
+    const auto focus = [this] { return gtk_root_get_focus(GTK_ROOT(windowWidget())); };
+    auto* before = focus();
+    ASSERT_NE(before, nullptr);
+
+    const auto alert =
+        std::make_shared<ui::AlertController>("Rename", "Enter a name.", ui::AlertStyle::Alert);
+    alert->addTextField([](ui::TextField& field) { field.setText("Plans"); });
+    const auto cancel = std::make_shared<ui::AlertAction>("Cancel", ui::AlertActionStyle::Default);
+    alert->addAction(cancel);
+    alert->addAction(std::make_shared<ui::AlertAction>("Done", ui::AlertActionStyle::Default));
+    alert->setEscapeAction(cancel);
+    root->presentViewController(alert, true);
+    settle();
+    for (const char* next : {"Cancel", "Done"}) {
+        gtk_widget_child_focus(windowWidget(), GTK_DIR_TAB_FORWARD);
+        settle();
+        EXPECT_EQ(focus(), findButton(next)) << "the field that was left does not take the focus along";
+    }
+    EXPECT_TRUE(window->backRequested());
+    settle();
+    EXPECT_EQ(root->presentedViewController(), nullptr);
+    EXPECT_EQ(focus(), before);
+}
+
+TEST_F(AlertTests, AnAlertIsAsHighAsItsBrokenLines)
+{
+    const auto alert = std::make_shared<ui::AlertController>(
+        "Objekt umbenennen", "Gib einen neuen Namen für dieses Objekt ein.", ui::AlertStyle::Alert);
+    alert->addTextField({});
+    alert->addAction(std::make_shared<ui::AlertAction>("Fertig", ui::AlertActionStyle::Default));
+    present(alert);
+    auto* field = peerOf(*alert->textFields().front())->widget();
+    auto* scrolled = gtk_widget_get_ancestor(field, GTK_TYPE_SCROLLED_WINDOW);
+    auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(scrolled));
+    EXPECT_EQ(gtk_adjustment_get_upper(adjustment), gtk_adjustment_get_page_size(adjustment))
+        << "nothing is hidden where the window has the room";
+}
+
+class Numbers : public ui::ListViewDataSource, public ui::ListViewDelegate {
+public:
+    std::size_t numberOfRows(const ui::ListView&) const override { return ids.size(); }
+    ui::ListRow rowAtIndex(const ui::ListView&, std::size_t index) const override
+    {
+        ui::ListRow row;
+        row.id = ids[index];
+        row.title = titles.count(row.id) ? titles.at(row.id) : "Row " + std::to_string(row.id);
+        return row;
+    }
+    ui::RowId rowIdAtIndex(const ui::ListView&, std::size_t index) const override { return ids[index]; }
+    void rowActivated(ui::ListView&, std::size_t index) override { activated.push_back(ids[index]); }
+    bool rowHeld(ui::ListView&, std::size_t index) override
+    {
+        held.push_back(ids[index]);
+        return true;
+    }
+    ui::Menu menuForRow(ui::ListView&, std::size_t index) override
+    {
+        menus.push_back(ids[index]);
+        return {};
+    }
+
+    std::vector<ui::RowId> held, menus;
+    std::vector<ui::RowId> ids;
+    std::map<ui::RowId, std::string> titles;
+    std::vector<ui::RowId> activated;
+};
+
+class ListTests : public testing_support::WindowFixture {
+protected:
+    void showRows(std::size_t count)
+    {
+        rows->ids.resize(count);
+        std::iota(rows->ids.begin(), rows->ids.end(), 1);
+        const auto screen = makeScreen("List");
+        list->setDataSource(rows);
+        list->setListDelegate(rows);
+        list->setAutoresizing({true, true});
+        list->setFrame(screen->view()->bounds());
+        screen->view()->addSubview(list);
+        show(screen);
+        list->setFrame({0, 0, window->bounds().width, window->bounds().height});
+        list->reloadAll();
+        settle();
+    }
+    host::gtk::ListViewPeer& listPeer() const
+    {
+        return dynamic_cast<host::gtk::ListViewPeer&>(*peerOf(*list));
+    }
+    bool matches(GtkWidget* row) const
+    {
+        const auto wanted = list->row(host::gtk::ListRowWidget::position(row));
+        return host::gtk::ListRowWidget::shown(row) == wanted
+            && host::gtk::ListRowWidget::titleText(row) == wanted.title;
+    }
+    /// Every row widget that is seen shows what the model has at its place, and soon all that exist do.
+    void expectRowsMatch()
+    {
+        EXPECT_FALSE(listPeer().liveRows().empty());
+        for (auto* row : listPeer().liveRows()) {
+            const auto position = host::gtk::ListRowWidget::position(row);
+            ASSERT_LT(position, list->rowCount());
+            EXPECT_TRUE(matches(row) || !list->visibleRows().contains(position)) << position;
+        }
+        const auto match = [this](GtkWidget* row) { return matches(row); };
+        waitFor(
+            [&] { return std::ranges::all_of(listPeer().liveRows(), match); }, "the rows beside the seen");
+    }
+    void change(std::vector<ui::RowId> after)
+    {
+        const auto changes = ui::ListChanges::between(rows->ids, after);
+        rows->ids = std::move(after);
+        list->apply(changes);
+        settle();
+    }
+
+    std::shared_ptr<Numbers> rows = std::make_shared<Numbers>();
+    std::shared_ptr<ui::ListView> list = std::make_shared<ui::ListView>();
+};
+
+TEST_F(ListTests, RowWidgetsMatchTheModelThroughEveryChange)
+{
+    showRows(500);
+    expectRowsMatch();
+    change({3, 1, 2, 900, 5, 901});
+    expectRowsMatch();
+    EXPECT_EQ(listPeer().liveRows().size(), 6U);
+    change({901, 900, 5, 3});
+    expectRowsMatch();
+    rows->titles[5] = "Renamed";
+    list->rowChanged(2);
+    settle();
+    expectRowsMatch();
+    change({});
+    EXPECT_TRUE(listPeer().liveRows().empty());
+    change({7});
+    expectRowsMatch();
+}
+
+TEST_F(ListTests, ATapOpensAndInSelectionModeMarks)
+{
+    showRows(4);
+    const auto activate = [&](guint position) {
+        g_signal_emit_by_name(listPeer().listWidget(), "activate", position);
+        settle();
+    };
+    activate(2);
+    EXPECT_THAT(rows->activated, ElementsAre(3U));
+    list->setSelectionMode(ui::SelectionMode::Multiple);
+    settle();
+    activate(1);
+    activate(3);
+    activate(1);
+    EXPECT_THAT(rows->activated, ElementsAre(3U));
+    EXPECT_THAT(list->selection().inOrder(list->rowIds()), ElementsAre(4U));
+    expectRowsMatch();
+}
+
+TEST_F(ListTests, ManyChangesElsewhereKeepThePlaceAndTheFocus)
+{
+    showRows(5000);
+    list->scrollToRow(2500, ui::RowPosition::Top, false);
+    settle();
+    EXPECT_EQ(list->visibleRows().first, 2500U);
+    list->focusRow(2503);
+    const auto focusedId = [this] {
+        auto* focused = gtk_root_get_focus(gtk_widget_get_root(listPeer().listWidget()));
+        auto* row = focused ? gtk_widget_get_first_child(focused) : nullptr;
+        const bool isRow = row && host::gtk::ListRowWidget::isRow(row);
+        return isRow ? host::gtk::ListRowWidget::shown(row).id : 0;
+    };
+    waitFor([&] { return focusedId() == 2504; }, "the focus to come to the row");
+    EXPECT_EQ(list->visibleRows().first, 2500U);
+    std::vector<ui::RowId> after;
+    for (ui::RowId id = 1; id <= 5000; ++id) {
+        after.push_back(id);
+        const bool isNear = id > 2490 && id < 2520;
+        if (id % 2 == 0 && !isNear)
+            after.push_back(100'000 + id);
+        if (id % 3 == 0 && !isNear)
+            after.pop_back();
+    }
+    change(after);
+    expectRowsMatch();
+    EXPECT_EQ(focusedId(), 2504U);
+    const auto first = list->visibleRows().first;
+    EXPECT_NEAR(static_cast<double>(rows->ids[first]), 2501, 1);
+
+    std::erase(after, 2504U);
+    change(after);
+    waitFor([&] { return focusedId() == 2505; }, "the focus to come to the row behind");
+}
+
+TEST_F(ListTests, AssistiveTechnologyCanOpenAskForTheMenuAndPeek)
+{
+    showRows(4);
+    for (auto* row : listPeer().liveRows()) {
+        for (const char* action : {"row.activate", "row.menu", "row.peek"})
+            EXPECT_TRUE(gtk_widget_activate_action(row, action, nullptr));
+    }
+    settle();
+    EXPECT_EQ(rows->activated.size(), 4U);
+    EXPECT_EQ(rows->menus, rows->activated);
+    EXPECT_EQ(rows->held, rows->activated);
+}
+
+TEST_F(ListTests, AHundredThousandRowsCostWhatIsNearTheVisibleOnes)
+{
+    showRows(100'000);
+    EXPECT_LT(listPeer().liveRows().size(), 400U);
+    list->scrollToRow(70'000, ui::RowPosition::Top, false);
+    settle();
+    EXPECT_EQ(list->visibleRows().first, 70'000U);
+    expectRowsMatch();
+    for (auto* row : listPeer().liveRows()) {
+        if (list->visibleRows().contains(host::gtk::ListRowWidget::position(row))) {
+            EXPECT_EQ(gtk_widget_get_height(row), static_cast<int>(list->rowHeight()));
+        }
+    }
+}
+
+} // namespace

@@ -1,0 +1,57 @@
+#pragma once
+
+#include "host/gtk/base/ViewPeer.h"
+#include "host/gtk/preview/PreviewModule.h"
+#include "host/gtk/screens/GtkWindowHost.h"
+#include "host/gtk/screens/NavigationPeer.h"
+#include "kit/NavigationController.h"
+#include "kit/Window.h"
+
+#include <gtest/gtest.h>
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace testing_support {
+
+/// The libraries of the previews that are linked with the test.
+std::shared_ptr<host::gtk::PreviewModule> linkedPreviews();
+
+/// A real window of 400 to 700 points. A test fails when the toolkit warned of anything.
+class WindowFixture : public ::testing::Test {
+protected:
+    WindowFixture();
+    ~WindowFixture() override;
+    void TearDown() override;
+
+    /// Shows a screen as the root, and waits until it has its size.
+    void show(const std::shared_ptr<platform::ui::ViewController>& root);
+    /// The stack around these screens, shown.
+    std::shared_ptr<platform::ui::NavigationController> showStack(
+        std::vector<std::shared_ptr<platform::ui::ViewController>> screens);
+    /// Runs the main loop until a condition holds; a test fails after five seconds.
+    void waitFor(const std::function<bool()>& condition, const char* what);
+    /// Runs the main loop until everything that was scheduled is shown and laid out.
+    void settle();
+    /// Ends the window and everything that shows it.
+    void closeWindow();
+
+    host::gtk::WindowPeer& peer() const { return *host->windowPeer(); }
+    GtkWidget* windowWidget() const { return GTK_WIDGET(peer().window()); }
+    host::gtk::ViewPeer* peerOf(const platform::ui::View& view) const;
+    GtkWidget* nativeOf(const platform::ui::View& view) const { return peerOf(view)->native(); }
+    /// Where a widget stands in the widget of another view's peer.
+    platform::Rect boundsIn(const platform::ui::View& view, const platform::ui::View& ancestor) const;
+    /// The first widget below the window with this type and this text on its label; null: none.
+    GtkWidget* findButton(const std::string& text) const;
+
+    std::shared_ptr<host::gtk::GtkWindowHost> host;
+    std::shared_ptr<platform::ui::Window> window;
+};
+
+/// A screen whose view a test fills.
+std::shared_ptr<platform::ui::ViewController> makeScreen(const std::string& title);
+
+} // namespace testing_support
