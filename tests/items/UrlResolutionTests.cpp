@@ -131,7 +131,8 @@ TEST_F(DocumentIdentifierTest, SaysWhichStepFailed)
     } rows[] = {
         {remove, {}, {}, "VXLibraryResolveDocumentId2 failed, errno:2(No such file or directory)"},
         {{}, remove, {}, "openDocument failed, errno:2(No such file or directory)"},
-        {{}, [&] { remove(), writeLink("a.txt", "/etc/hostname"); }, {}, "openDocument failed, errno:40(Too many levels of symbolic links)"},
+        {{}, [&] { remove(), writeLink("a.txt", "/etc/hostname"); }, {},
+            "openDocument failed, errno:40(Too many levels of symbolic links)"},
         {{}, {}, remove, "readAttributes failed, error:2(No such file or directory)"},
         {{}, {}, [&] { std::filesystem::rename(at("a.txt").path(), layout().home() + "/out"); },
             "readAttributes failed, error:18(Invalid cross-device link)"},

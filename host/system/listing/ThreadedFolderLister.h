@@ -15,8 +15,8 @@ class MimeTypeRegistry;
 struct ListingTools;
 
 /// Lists folders by reading their names alone, on all cores, and watches them afterwards. What is told of a
-/// name leads to a look at that name alone; a folder that changes without end is followed in steps, which take
-/// a fifth of the time at most.
+/// name leads to a look at that name alone; a folder that changes without end is followed in steps, which
+/// take a fifth of the time at most.
 class ThreadedFolderLister : public platform::FolderLister {
 public:
     /// `locale` chooses the order of names, as ICU names it.
