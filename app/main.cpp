@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 #include "app/AppDelegate.h"
 #include "host/drive/service/LocalActivityHandOver.h"
 #include "host/drive/service/LocalCloudDocumentService.h"

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // The peer of the start figure: a libadwaita window with a header bar and one label, nothing else.
 
 #include <adwaita.h>

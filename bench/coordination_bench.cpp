@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // A move through coordination that nobody else asks for, beside the bare rename. What coordination costs is
 // the difference: at most 20 microseconds are fine.
 

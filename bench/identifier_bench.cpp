@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // Finding a document by its identifier, beside what nobody can do without: one look into the database, one
 // open and one read of the attribute. The drive holds as many documents with an identifier as the argument
 // says; they are looked up in an order that has nothing to do with their places.

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // A folder's list, sorted and ready on the main queue, beside its floor: getdents64 and statx of everything
 // in the same folder in one thread. Each size prints the ratio as "x_floor" and, for large folders, when the
 // first rows came.

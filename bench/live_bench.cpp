@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // How soon an open list shows a change on disk, beside a bare loop over inotify and statx in the same run;
 // and how long the main loop stays away while 10,000 files arrive.
 //

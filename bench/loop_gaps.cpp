@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // A library to preload: reports how long the main thread stays away from its loop.
 //
 // LD_PRELOAD=libloop_gaps.so PROGRAM prints a line on standard error for each turn of the main loop that took

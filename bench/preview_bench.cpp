@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // From the tap to the first pixels of a document, beside what nobody can do without: for a photo of 20
 // million pixels the bare decoding to the screen's size, for a PDF document of 500 pages the bare drawing of
 // page one.

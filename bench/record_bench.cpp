@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // Reading an item into its record, beside the system calls that nobody can do without: for a local file one
 // statx and one getxattr, for a promise one statx that fails and the promise's file read once.
 

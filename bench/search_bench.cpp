@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // A search as typed over a million names, beside its floor: one scan of the packed folded names for the same
 // text that skips from hit to hit and counts the names hit. Prints the ratio as "x_floor", what was found,
 // and the memory for each item.

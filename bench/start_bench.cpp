@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // Process start to the first painted list, beside a bare libadwaita window started the same way.
 //
 // Usage: start_bench ROUNDS PROGRAM PEER, with DISPLAY and TARROW_DRIVE_HOME set. Both are started in turn,

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // How a list's bars are configured, the line under it, and the choosing of several items.
 
 #include "browser/ListLogging.h"

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // What is done to items: new folders, moves, new names and deletions, and who asks for them.
 
 #include "browser/ItemDeletion.h"

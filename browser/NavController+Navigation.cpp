@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // The ways through the drive: taps, links, jumps from outside, search, peek and pop.
 
 #include "browser/NavController.h"

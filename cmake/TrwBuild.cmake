@@ -1,3 +1,6 @@
+# SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+# SPDX-License-Identifier: GPL-3.0-or-later
+
 # One target per folder, and headers that only the folders allowed to can see.
 #
 # trw_folder(<target> <folder> [LINKS <public targets>...] [PRIVATE_LINKS <targets>...] [ONLY <regex>] [EXCEPT <regex>])

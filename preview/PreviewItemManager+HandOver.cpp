@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // The previewed document as something that the account's other devices can go on with.
 
 #include "items/DRItem.h"

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // What others do to the previewed item, and how the preview follows.
 
 #include "items/DRItem.h"

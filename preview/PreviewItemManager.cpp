@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // Which screen shows an item, and the way of the stack to it. The presenter, the actions and the hand-over
 // have sources of their own.
 

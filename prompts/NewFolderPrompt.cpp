@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 #include "prompts/NewFolderPrompt.h"
 
 #include "platform/Localization.h"

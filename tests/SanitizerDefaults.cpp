@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // What the sanitizers find in libraries and not in this program. Part of every test program of a sanitized
 // build.
 

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // The order of a list, and the menu in which it is chosen.
 
 #include "platform/Localization.h"

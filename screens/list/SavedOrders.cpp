@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // The orders that the user chose for folders, in the user defaults.
 
 #include "platform/Services.h"

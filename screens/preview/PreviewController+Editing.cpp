@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // Changing the document that is shown, and what becomes of the edits.
 
 #include "kit/NavigationController.h"

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // What a person points at, and what is shown while the document is being changed.
 
 #include "screens/preview/PreviewPagesView.h"

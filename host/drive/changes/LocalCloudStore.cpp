@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 #include "host/drive/changes/LocalCloudStore.h"
 
 #include "host/drive/changes/TreeCopy.h"

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // Reading a document to replace its content later, and replacing it.
 
 #include "host/drive/changes/LocalItemChanges.h"

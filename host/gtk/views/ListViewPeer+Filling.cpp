@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // What rows show: those that are seen at once, the others a few in each frame.
 
 #include "host/gtk/views/ListRowWidget.h"

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // What keys do in a list, beside those of the toolkit (arrows, Home, End, pages, return).
 
 #include "host/gtk/base/MenuPopover.h"

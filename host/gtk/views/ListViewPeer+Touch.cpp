@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // What fingers do in a list, beside the scrolling and tapping of the toolkit.
 
 #include "host/gtk/views/ListRowWidget.h"

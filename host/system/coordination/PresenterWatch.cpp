@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 #include "host/system/coordination/PresenterWatch.h"
 
 #include "host/system/coordination/PresenterNotices.h"

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // What a person does in a folder's list: tap, choose, select, type, search.
 
 #include "tests/screens/support/DocumentListFixture.h"

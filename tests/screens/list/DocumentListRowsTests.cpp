@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // What the rows of a folder's list show.
 
 #include "tests/screens/support/DocumentListFixture.h"

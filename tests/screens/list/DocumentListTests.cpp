@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // What a folder's list makes of its folder: its states, its order, and where it belongs.
 
 #include "tests/screens/support/DocumentListFixture.h"

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // A list that follows its folder by what the kernel tells must always come to say what a fresh reading says.
 
 #include "screens/list/FolderContents.h"

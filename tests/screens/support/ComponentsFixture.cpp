@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 #include "tests/screens/support/ComponentsFixture.h"
 
 #include "host/system/desktop/MimeTypeRegistry.h"

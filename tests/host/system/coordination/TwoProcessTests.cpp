@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // What two processes on one drive know of each other. The other process is a program of these tests.
 
 #include "host/system/coordination/LocalFileCoordinator.h"

@@ -1,3 +1,6 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
 // The other process of a test: does to files what each line of its input says, and answers each with a line.
 // The first argument is the lock file that both processes share.
 
