@@ -7,8 +7,8 @@
 
 namespace platform::ui {
 
-LayoutAnchor::LayoutAnchor(std::weak_ptr<View> view, LayoutAttribute attribute)
-    : _view(std::move(view))
+LayoutAnchor::LayoutAnchor(std::weak_ptr<LayoutItem> item, LayoutAttribute attribute)
+    : _item(std::move(item))
     , _attribute(attribute)
 {
 }

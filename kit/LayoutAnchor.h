@@ -8,7 +8,7 @@
 namespace platform::ui {
 
 class LayoutConstraint;
-class View;
+class LayoutItem;
 
 enum class LayoutAttribute {
     None,
@@ -46,9 +46,9 @@ inline constexpr LayoutPriority fittingSize =
 class LayoutAnchor {
 public:
     LayoutAnchor() = default;
-    LayoutAnchor(std::weak_ptr<View> view, LayoutAttribute attribute);
+    LayoutAnchor(std::weak_ptr<LayoutItem> item, LayoutAttribute attribute);
 
-    std::shared_ptr<View> view() const { return _view.lock(); }
+    std::shared_ptr<LayoutItem> item() const { return _item.lock(); }
     LayoutAttribute attribute() const { return _attribute; }
     bool isNone() const { return _attribute == LayoutAttribute::None; }
 
@@ -63,7 +63,7 @@ public:
     Made greaterThanOrEqualToConstant(double constant) const;
 
 private:
-    std::weak_ptr<View> _view;
+    std::weak_ptr<LayoutItem> _item;
     LayoutAttribute _attribute = LayoutAttribute::None;
 };
 

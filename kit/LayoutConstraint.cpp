@@ -3,7 +3,7 @@
 
 #include "kit/LayoutConstraint.h"
 
-#include "kit/View.h"
+#include "kit/LayoutItem.h"
 #include "platform/Log.h"
 
 #include <algorithm>
@@ -23,8 +23,8 @@ std::string_view attributeName(LayoutAttribute attribute)
 
 std::string anchorName(const LayoutAnchor& anchor)
 {
-    const auto view = anchor.view();
-    std::string name = !view ? "(gone)" : view->debugName().empty() ? "view" : view->debugName();
+    const auto item = anchor.item();
+    std::string name = !item ? "(gone)" : item->debugName().empty() ? "view" : item->debugName();
     return name.append(".").append(attributeName(anchor.attribute()));
 }
 
@@ -45,8 +45,8 @@ void LayoutConstraint::setConstant(double constant)
     if (constant == _constant)
         return;
     _constant = constant;
-    if (const auto view = _first.view(); view && _active)
-        view->constraintConstantDidChange(*this);
+    if (const auto item = _first.item(); item && _active)
+        item->constraintConstantDidChange(*this);
 }
 
 void LayoutConstraint::setPriority(LayoutPriority priority)
@@ -55,8 +55,8 @@ void LayoutConstraint::setPriority(LayoutPriority priority)
     if (priority == _priority)
         return;
     _priority = priority;
-    if (const auto view = _first.view(); view && _active)
-        view->layoutInputDidChange();
+    if (const auto item = _first.item(); item && _active)
+        item->layoutInputDidChange();
 }
 
 std::shared_ptr<LayoutConstraint> LayoutConstraint::withPriority(LayoutPriority priority)
@@ -70,18 +70,18 @@ bool LayoutConstraint::setActive(bool active)
     static constexpr Operation op{"-[LayoutConstraint setActive:]"};
     if (active == _active)
         return true;
-    const auto view = _first.view();
-    _active = active && view;
-    if (!view) {
+    const auto item = _first.item();
+    _active = active && item;
+    if (!item) {
         if (active)
             op.warning("No view to constrain: %{public}@", description());
         return !active;
     }
     if (active)
-        view->_constraints.push_back(shared_from_this());
+        item->_constraints.push_back(shared_from_this());
     else
-        std::erase(view->_constraints, shared_from_this());
-    view->layoutInputDidChange();
+        std::erase(item->_constraints, shared_from_this());
+    item->layoutInputDidChange();
     return true;
 }
 

@@ -3,9 +3,8 @@
 
 #include "kit/LayoutEngine.h"
 
+#include "kit/LayoutItem.h"
 #include "kit/LayoutTranslation.h"
-#include "kit/View.h"
-#include "kit/ViewController.h"
 #include "platform/Log.h"
 
 #include <algorithm>
@@ -16,7 +15,7 @@ namespace platform::ui {
 
 namespace {
 
-// A layout settles in two or three passes; the bounds only end views whose answers go round in circles.
+// A layout settles in two or three passes; the bounds only end items whose answers go round in circles.
 constexpr int maximumPasses = 12;
 constexpr int maximumWrapRounds = 4;
 
@@ -32,15 +31,15 @@ constexpr double tolerance = 1e-6;
 using ConstraintId = LayoutSolver::ConstraintId;
 using Term = LayoutSolver::Term;
 
-/// The wanted length of a view on one axis as it stands in the solver.
+/// The wanted length of a item on one axis as it stands in the solver.
 struct Wish {
     double wanted = LayoutItem::noIntrinsicMetric;
     LayoutPriority hugging = 0, resistance = 0;
     std::optional<ConstraintId> id, notNegative;
 };
 
-struct PlacedView {
-    std::weak_ptr<View> view;
+struct PlacedItem {
+    std::weak_ptr<LayoutItem> item;
     std::array<Wish, 2> wishes;
     double wrappedAt = -1; ///< the width for which the wanted height was asked last
     bool wishesAreStale = true;
@@ -64,68 +63,70 @@ struct Addition {
 } // namespace
 
 struct LayoutEngine::Impl {
-    explicit Impl(View& view)
-        : root(view)
-        , translation(view, variables)
+    explicit Impl(LayoutItem& item)
+        : root(item)
+        , translation(item, variables)
     {
     }
 
-    View& root;
+    LayoutItem& root;
     LayoutSolver solver;
     LayoutTranslation::Variables variables;
     LayoutTranslation translation;
-    std::unordered_map<const View*, PlacedView> placed;
+    std::unordered_map<const LayoutItem*, PlacedItem> placed;
     std::unordered_map<const LayoutConstraint*, ActiveRule> rules;
-    std::vector<std::shared_ptr<View>> tree; ///< as of the last synchronisation, parents first
-    std::vector<std::shared_ptr<View>> inner; ///< roots of layouts of their own in this tree
+    std::vector<std::shared_ptr<LayoutItem>> tree; ///< as of the last synchronisation, parents first
+    std::vector<std::shared_ptr<LayoutItem>> inner; ///< roots of layouts of their own in this tree
     std::vector<Addition> additions;
     std::uint64_t generation = 0;
     bool structureIsStale = true, wishesAreStale = true, isRunning = false, isFitting = false;
 
-    bool hasVariables(const View& view) const { return &view == &root ? isFitting : !view.isPlacedByFrame(); }
+    bool hasVariables(const LayoutItem& item) const
+    {
+        return &item == &root ? isFitting : !item.isPlacedByFrame();
+    }
 
-    void updateConstraints(View& view);
-    void collect(const std::shared_ptr<View>& view);
+    void updateConstraints(LayoutItem& item);
+    void collect(const std::shared_ptr<LayoutItem>& item);
     void synchronize();
     void synchronizeRules();
     void removeRule(ActiveRule& rule);
-    void placeViews();
-    void removeGoneViews();
-    void updateWishes(const View& view, PlacedView& entry);
-    void updateWish(LayoutSolver::Variable length, Wish& wish, const View& view, Axis axis);
+    void placeItems();
+    void removeGoneItems();
+    void updateWishes(const LayoutItem& item, PlacedItem& entry);
+    void updateWish(LayoutSolver::Variable length, Wish& wish, const LayoutItem& item, Axis axis);
     void remove(std::optional<ConstraintId>& id);
     void addAll();
     void solve();
     bool updateWrappedHeights();
-    Rect solvedFrame(const View& view) const;
+    Rect solvedFrame(const LayoutItem& item) const;
     void applyFrames();
-    void layoutViews();
+    void layOutContents();
 };
 
-void LayoutEngine::Impl::updateConstraints(View& view)
+void LayoutEngine::Impl::updateConstraints(LayoutItem& item)
 {
-    if (view._needsUpdateConstraints) {
-        view._needsUpdateConstraints = false;
-        view.updateConstraints();
+    if (item._needsUpdateConstraints) {
+        item._needsUpdateConstraints = false;
+        item.updateConstraints();
     }
-    const auto subviews = view.subviews();
-    for (const auto& subview : subviews) {
-        if (!subview->_layoutBoundary)
-            updateConstraints(*subview);
+    for (const auto& child : item.layoutChildren()) {
+        if (!child->_layoutBoundary)
+            updateConstraints(*child);
     }
 }
 
-void LayoutEngine::Impl::collect(const std::shared_ptr<View>& view)
+void LayoutEngine::Impl::collect(const std::shared_ptr<LayoutItem>& item)
 {
     // The root owns this engine, but for one that is made for a fitting size alone: to hold the root from
     // here would keep both for ever.
-    const bool isOwner = view.get() == &root && !isFitting;
-    tree.push_back(isOwner ? std::shared_ptr<View>(std::shared_ptr<void>(), &root) : view);
-    for (const auto& subview : view->subviews()) {
-        if (subview->_layoutBoundary)
-            inner.push_back(subview);
+    const bool isOwner = item.get() == &root && !isFitting;
+    tree.push_back(isOwner ? std::shared_ptr<LayoutItem>(std::shared_ptr<void>(), &root) : item);
+    for (const auto& child : item->layoutChildren()) {
+        if (child->_layoutBoundary)
+            inner.push_back(child);
         else
-            collect(subview);
+            collect(child);
     }
 }
 
@@ -136,42 +137,42 @@ void LayoutEngine::Impl::synchronize()
         structureIsStale = false;
         tree.clear();
         inner.clear();
-        collect(root.shared_from_this());
+        collect(root.layoutReference());
         ++generation;
-        placeViews();
+        placeItems();
         synchronizeRules();
-        removeGoneViews();
+        removeGoneItems();
         wishesAreStale = true;
     }
     // Before the wishes: most of them then find a length that is still free.
     addAll();
     if (wishesAreStale) {
-        for (const auto& view : tree) {
-            if (const auto entry = placed.find(view.get()); entry != placed.end())
-                updateWishes(*view, entry->second);
+        for (const auto& item : tree) {
+            if (const auto entry = placed.find(item.get()); entry != placed.end())
+                updateWishes(*item, entry->second);
         }
         wishesAreStale = false;
     }
 }
 
-void LayoutEngine::Impl::placeViews()
+void LayoutEngine::Impl::placeItems()
 {
-    for (const auto& view : tree) {
-        if (!hasVariables(*view))
+    for (const auto& item : tree) {
+        if (!hasVariables(*item))
             continue;
-        if (const auto found = placed.find(view.get()); found != placed.end()) {
-            if (found->second.view.lock() == view)
+        if (const auto found = placed.find(item.get()); found != placed.end()) {
+            if (found->second.item.lock() == item)
                 continue;
-            // Another view has come to stand at the address of one that is gone; nothing of the old one
+            // Another item has come to stand at the address of one that is gone; nothing of the old one
             // holds.
-            found->second = {view, found->second.wishes, -1, true};
+            found->second = {item, found->second.wishes, -1, true};
             continue;
         }
-        auto& entry = placed[view.get()];
-        entry.view = view;
+        auto& entry = placed[item.get()];
+        entry.item = item;
         const LayoutVariables own{
             solver.addVariable(), solver.addVariable(), solver.addVariable(), solver.addVariable()};
-        variables[view.get()] = own;
+        variables[item.get()] = own;
     }
 }
 
@@ -183,8 +184,8 @@ void LayoutEngine::Impl::removeRule(ActiveRule& rule)
 void LayoutEngine::Impl::synchronizeRules()
 {
     translation.forgetFramesUsed();
-    for (const auto& view : tree) {
-        for (const auto& constraint : view->constraints()) {
+    for (const auto& item : tree) {
+        for (const auto& constraint : item->constraints()) {
             auto rule = translation.translate(*constraint);
             if (!rule)
                 continue;
@@ -213,18 +214,18 @@ void LayoutEngine::Impl::synchronizeRules()
     }
 }
 
-void LayoutEngine::Impl::removeGoneViews()
+void LayoutEngine::Impl::removeGoneItems()
 {
-    std::unordered_set<const View*> present;
-    for (const auto& view : tree) {
-        if (hasVariables(*view))
-            present.insert(view.get());
+    std::unordered_set<const LayoutItem*> present;
+    for (const auto& item : tree) {
+        if (hasVariables(*item))
+            present.insert(item.get());
     }
     std::erase_if(placed, [&](auto& entry) {
         if (present.contains(entry.first))
             return false;
-        auto& view = entry.second;
-        for (const auto& wish : view.wishes) {
+        auto& item = entry.second;
+        for (const auto& wish : item.wishes) {
             for (const auto& id : {wish.id, wish.notNegative}) {
                 if (id)
                     solver.removeConstraint(*id);
@@ -238,22 +239,23 @@ void LayoutEngine::Impl::removeGoneViews()
     });
 }
 
-void LayoutEngine::Impl::updateWishes(const View& view, PlacedView& entry)
+void LayoutEngine::Impl::updateWishes(const LayoutItem& item, PlacedItem& entry)
 {
-    const auto& own = variables.at(&view);
+    const auto& own = variables.at(&item);
     if (std::exchange(entry.wishesAreStale, false)) {
-        const Size size = view.intrinsicContentSize();
+        const Size size = item.intrinsicContentSize();
         entry.wishes[0].wanted = size.width;
         entry.wishes[1].wanted = size.height;
         entry.wrappedAt = -1;
     }
-    updateWish(own.width, entry.wishes[0], view, Axis::Horizontal);
-    updateWish(own.height, entry.wishes[1], view, Axis::Vertical);
+    updateWish(own.width, entry.wishes[0], item, Axis::Horizontal);
+    updateWish(own.height, entry.wishes[1], item, Axis::Vertical);
 }
 
-void LayoutEngine::Impl::updateWish(LayoutSolver::Variable length, Wish& wish, const View& view, Axis axis)
+void LayoutEngine::Impl::updateWish(
+    LayoutSolver::Variable length, Wish& wish, const LayoutItem& item, Axis axis)
 {
-    const auto hugging = view.hugging(axis), resistance = view.compressionResistance(axis);
+    const auto hugging = item.hugging(axis), resistance = item.compressionResistance(axis);
     const bool isKept = wish.hugging == hugging && wish.resistance == resistance;
     wish.hugging = hugging;
     wish.resistance = resistance;
@@ -317,65 +319,60 @@ void LayoutEngine::Impl::solve()
     }
 }
 
-/// Asks views whose height depends on their width anew where the width has changed. True when a height is
+/// Asks items whose height depends on their width anew where the width has changed. True when a height is
 /// another.
 bool LayoutEngine::Impl::updateWrappedHeights()
 {
     bool isAnother = false;
-    for (const auto& view : tree) {
-        const auto found = placed.find(view.get());
-        if (found == placed.end() || !view->wrapsContent())
+    for (const auto& item : tree) {
+        const auto found = placed.find(item.get());
+        if (found == placed.end() || !item->wrapsContent())
             continue;
         auto& entry = found->second;
-        const double width = solver.value(variables.at(view.get()).width);
+        const double width = solver.value(variables.at(item.get()).width);
         if (width <= 0 || std::abs(width - entry.wrappedAt) < tolerance)
             continue;
         entry.wrappedAt = width;
-        const double height = view->intrinsicContentSize(width).height;
+        const double height = item->intrinsicContentSize(width).height;
         if (std::abs(height - entry.wishes[1].wanted) < tolerance)
             continue;
         entry.wishes[1].wanted = height;
-        updateWish(variables.at(view.get()).height, entry.wishes[1], *view, Axis::Vertical);
+        updateWish(variables.at(item.get()).height, entry.wishes[1], *item, Axis::Vertical);
         isAnother = true;
     }
     return isAnother;
 }
 
-Rect LayoutEngine::Impl::solvedFrame(const View& view) const
+Rect LayoutEngine::Impl::solvedFrame(const LayoutItem& item) const
 {
-    const auto& own = variables.at(&view);
+    const auto& own = variables.at(&item);
     const double x = solver.value(own.x), y = solver.value(own.y);
-    const double left = View::roundToPixel(x), top = View::roundToPixel(y);
-    return {left, top, std::max(0.0, View::roundToPixel(x + solver.value(own.width)) - left),
-        std::max(0.0, View::roundToPixel(y + solver.value(own.height)) - top)};
+    const double left = LayoutItem::roundToPixel(x), top = LayoutItem::roundToPixel(y);
+    return {left, top, std::max(0.0, LayoutItem::roundToPixel(x + solver.value(own.width)) - left),
+        std::max(0.0, LayoutItem::roundToPixel(y + solver.value(own.height)) - top)};
 }
 
 void LayoutEngine::Impl::applyFrames()
 {
-    for (const auto& view : tree) {
-        if (view.get() != &root && placed.contains(view.get()))
-            view->setFrame(solvedFrame(*view));
+    for (const auto& item : tree) {
+        if (item.get() != &root && placed.contains(item.get()))
+            item->setFrame(solvedFrame(*item));
     }
 }
 
-void LayoutEngine::Impl::layoutViews()
+void LayoutEngine::Impl::layOutContents()
 {
-    // A view may change the tree while it lays out its subviews.
-    const auto views = tree;
-    for (const auto& view : views) {
-        if (!view->_needsLayout)
+    // A item may change the tree while it lays out its subviews.
+    const auto items = tree;
+    for (const auto& item : items) {
+        if (!item->_needsLayout)
             continue;
-        view->_needsLayout = false;
-        const auto controller = view->_controller.lock();
-        if (controller)
-            controller->viewWillLayoutSubviews();
-        view->layoutSubviews();
-        if (controller)
-            controller->viewDidLayoutSubviews();
+        item->_needsLayout = false;
+        item->layOutContent();
     }
 }
 
-LayoutEngine::LayoutEngine(View& root)
+LayoutEngine::LayoutEngine(LayoutItem& root)
     : _impl(std::make_unique<Impl>(root))
 {
 }
@@ -399,18 +396,18 @@ void LayoutEngine::constantDidChange(const LayoutConstraint& constraint)
     _impl->solver.setConstant(*found->second.id, rule->constant);
 }
 
-void LayoutEngine::intrinsicSizeDidChange(const View& view)
+void LayoutEngine::intrinsicSizeDidChange(const LayoutItem& item)
 {
-    const auto found = _impl->placed.find(&view);
+    const auto found = _impl->placed.find(&item);
     if (found == _impl->placed.end())
         return;
     found->second.wishesAreStale = true;
     _impl->wishesAreStale = true;
 }
 
-void LayoutEngine::frameDidChange(const View& view)
+void LayoutEngine::frameDidChange(const LayoutItem& item)
 {
-    if (!_impl->hasVariables(view) && _impl->translation.framesUsed().contains(&view))
+    if (!_impl->hasVariables(item) && _impl->translation.framesUsed().contains(&item))
         _impl->structureIsStale = true;
 }
 
@@ -425,7 +422,7 @@ void LayoutEngine::layout()
     if (_impl->isRunning)
         return;
     _impl->isRunning = true;
-    View& root = _impl->root;
+    LayoutItem& root = _impl->root;
     int passes = 0;
     for (; root._treeNeedsLayout && passes < maximumPasses; ++passes) {
         root._treeNeedsLayout = false;
@@ -434,14 +431,14 @@ void LayoutEngine::layout()
         for (int round = 0; round < maximumWrapRounds && _impl->updateWrappedHeights(); ++round)
             _impl->solve();
         _impl->applyFrames();
-        _impl->layoutViews();
+        _impl->layOutContents();
     }
     if (passes == maximumPasses)
         op.warning("The layout of %{public}@ does not settle", root.debugName());
     const auto inner = _impl->inner;
-    for (const auto& view : inner) {
-        if (view->_treeNeedsLayout)
-            view->engine().layout();
+    for (const auto& item : inner) {
+        if (item->_treeNeedsLayout)
+            item->engine().layout();
     }
     root._treeNeedsLayout = false;
     _impl->isRunning = false;

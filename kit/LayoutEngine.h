@@ -10,23 +10,23 @@
 namespace platform::ui {
 
 class LayoutConstraint;
-class View;
+class LayoutItem;
 
-/// Lays out one tree of views: brings the active constraints and the wanted sizes into a solver, reads the
-/// frames out of it and calls `layoutSubviews` where it is due. The root view of the tree owns it.
+/// Lays out one tree of items: brings the active constraints and the wanted sizes into a solver, reads the
+/// frames out of it and calls `layoutSubviews` where it is due. The root item of the tree owns it.
 class LayoutEngine {
 public:
-    explicit LayoutEngine(View& root);
+    explicit LayoutEngine(LayoutItem& root);
     ~LayoutEngine();
 
-    /// Which views, constraints or priorities there are has changed.
+    /// Which items, constraints or priorities there are has changed.
     void structureDidChange();
     void constantDidChange(const LayoutConstraint& constraint);
-    void intrinsicSizeDidChange(const View& view);
-    /// A view that is placed by its frame, or the root, got another one.
-    void frameDidChange(const View& view);
+    void intrinsicSizeDidChange(const LayoutItem& item);
+    /// A item that is placed by its frame, or the root, got another one.
+    void frameDidChange(const LayoutItem& item);
 
-    /// Lays out everything that is stale. Ends also when the views' answers do not settle. A call from within
+    /// Lays out everything that is stale. Ends also when the items' answers do not settle. A call from within
     /// a layout does nothing.
     void layout();
     bool isRunning() const;

@@ -3,8 +3,6 @@
 
 #include "kit/LayoutTranslation.h"
 
-#include "kit/View.h"
-
 #include <algorithm>
 
 namespace platform::ui {
@@ -49,7 +47,7 @@ bool LayoutRule::hasSameTerms(const LayoutRule& other) const
             });
 }
 
-LayoutTranslation::LayoutTranslation(const View& root, const Variables& variables)
+LayoutTranslation::LayoutTranslation(const LayoutItem& root, const Variables& variables)
     : _root(root)
     , _variables(variables)
 {
@@ -57,10 +55,10 @@ LayoutTranslation::LayoutTranslation(const View& root, const Variables& variable
 
 std::optional<LayoutRule> LayoutTranslation::translate(const LayoutConstraint& constraint)
 {
-    const auto first = constraint.first().view(), second = constraint.second().view();
+    const auto first = constraint.first().item(), second = constraint.second().item();
     if (!first || !isInTree(*first) || (!constraint.second().isNone() && (!second || !isInTree(*second))))
         return std::nullopt;
-    const bool rightToLeft = _root.traits().isRightToLeft();
+    const bool rightToLeft = _root.isRightToLeft();
     // Distances along the reading direction count from the right then.
     const bool isMirrored = rightToLeft
         && (isRelativeToDirection(constraint.first().attribute())
@@ -76,29 +74,29 @@ std::optional<LayoutRule> LayoutTranslation::translate(const LayoutConstraint& c
     return rule.terms.empty() ? std::nullopt : std::optional(std::move(rule));
 }
 
-bool LayoutTranslation::isInTree(const View& view) const
+bool LayoutTranslation::isInTree(const LayoutItem& item) const
 {
-    if (&view == &_root)
+    if (&item == &_root)
         return true;
-    const auto above = view.superview();
+    const auto above = item.layoutParent();
     return above && isInTree(*above);
 }
 
-/// The nearest view around both sides; a position alone is one in the superview.
-std::shared_ptr<View> LayoutTranslation::commonSpace(const LayoutConstraint& constraint) const
+/// The nearest item around both sides; a position alone is one in the parent.
+std::shared_ptr<LayoutItem> LayoutTranslation::commonSpace(const LayoutConstraint& constraint) const
 {
-    auto space = constraint.first().view();
-    const auto second = constraint.second().view();
+    auto space = constraint.first().item();
+    const auto second = constraint.second().item();
     if (!second)
-        return space.get() == &_root ? space : space->superview();
-    while (space && !second->isDescendantOf(*space))
-        space = space->superview();
+        return space.get() == &_root ? space : space->layoutParent();
+    while (space && !second->isInside(*space))
+        space = space->layoutParent();
     return space;
 }
 
-const LayoutVariables* LayoutTranslation::variables(const View& view) const
+const LayoutVariables* LayoutTranslation::variables(const LayoutItem& item) const
 {
-    const auto found = _variables.find(&view);
+    const auto found = _variables.find(&item);
     return found == _variables.end() ? nullptr : &found->second;
 }
 
@@ -106,9 +104,9 @@ void LayoutTranslation::add(LayoutRule& rule, const Side& side, double factor)
 {
     switch (side.attribute) {
     case LayoutAttribute::Width:
-        return addLength(rule, *side.view, Axis::Horizontal, factor);
+        return addLength(rule, *side.item, Axis::Horizontal, factor);
     case LayoutAttribute::Height:
-        return addLength(rule, *side.view, Axis::Vertical, factor);
+        return addLength(rule, *side.item, Axis::Vertical, factor);
     case LayoutAttribute::Left:
     case LayoutAttribute::Leading:
         return addPosition(rule, side, Axis::Horizontal, 0, factor);
@@ -124,41 +122,42 @@ void LayoutTranslation::add(LayoutRule& rule, const Side& side, double factor)
     case LayoutAttribute::Bottom:
         return addPosition(rule, side, Axis::Vertical, 1, factor);
     case LayoutAttribute::FirstBaseline:
-        rule.constant -= factor * side.view->firstBaselineOffset();
+        rule.constant -= factor * side.item->firstBaselineOffset();
         return addPosition(rule, side, Axis::Vertical, 0, factor);
     case LayoutAttribute::LastBaseline:
-        rule.constant += factor * side.view->lastBaselineOffset();
+        rule.constant += factor * side.item->lastBaselineOffset();
         return addPosition(rule, side, Axis::Vertical, 1, factor);
     case LayoutAttribute::None:
         break;
     }
 }
 
-/// A line across the view, at a share of its length from its origin.
+/// A line across the item, at a share of its length from its origin.
 void LayoutTranslation::addPosition(
     LayoutRule& rule, const Side& side, Axis axis, double share, double factor)
 {
     if (share != 0)
-        addLength(rule, *side.view, axis, share * factor);
-    auto next = side.view->shared_from_this();
-    for (; next && next.get() != side.space; next = next->superview()) {
+        addLength(rule, *side.item, axis, share * factor);
+    std::shared_ptr<LayoutItem> parent;
+    const auto* next = side.item;
+    for (; next && next != side.space; parent = next->layoutParent(), next = parent.get()) {
         if (const auto* place = variables(*next)) {
             rule.terms.push_back({axis == Axis::Horizontal ? place->x : place->y, factor});
         } else {
             rule.constant -= factor * (axis == Axis::Horizontal ? next->frame().x : next->frame().y);
-            _framesUsed.insert(next.get());
+            _framesUsed.insert(next);
         }
     }
 }
 
-void LayoutTranslation::addLength(LayoutRule& rule, const View& view, Axis axis, double factor)
+void LayoutTranslation::addLength(LayoutRule& rule, const LayoutItem& item, Axis axis, double factor)
 {
-    if (const auto* place = variables(view)) {
+    if (const auto* place = variables(item)) {
         rule.terms.push_back({axis == Axis::Horizontal ? place->width : place->height, factor});
         return;
     }
-    rule.constant -= factor * (axis == Axis::Horizontal ? view.frame().width : view.frame().height);
-    _framesUsed.insert(&view);
+    rule.constant -= factor * (axis == Axis::Horizontal ? item.frame().width : item.frame().height);
+    _framesUsed.insert(&item);
 }
 
 } // namespace platform::ui

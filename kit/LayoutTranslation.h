@@ -13,7 +13,7 @@
 
 namespace platform::ui {
 
-/// The place and size of a view in the solver; the origin is in the superview's coordinates.
+/// The place and size of a item in the solver; the origin is in the parent's coordinates.
 struct LayoutVariables {
     LayoutSolver::Variable x, y, width, height;
 };
@@ -27,36 +27,36 @@ struct LayoutRule {
     bool hasSameTerms(const LayoutRule& other) const;
 };
 
-/// Turns constraints between the views of one tree into rules. The frame of a view without variables is a
+/// Turns constraints between the items of one tree into rules. The frame of a item without variables is a
 /// number.
 class LayoutTranslation {
 public:
-    using Variables = std::unordered_map<const View*, LayoutVariables>;
+    using Variables = std::unordered_map<const LayoutItem*, LayoutVariables>;
 
-    LayoutTranslation(const View& root, const Variables& variables);
+    LayoutTranslation(const LayoutItem& root, const Variables& variables);
 
-    /// Nothing when the views do not both stand in the tree, or when there is nothing to solve.
+    /// Nothing when the items do not both stand in the tree, or when there is nothing to solve.
     std::optional<LayoutRule> translate(const LayoutConstraint& constraint);
-    /// The views whose frames went into rules as numbers.
-    const std::unordered_set<const View*>& framesUsed() const { return _framesUsed; }
+    /// The items whose frames went into rules as numbers.
+    const std::unordered_set<const LayoutItem*>& framesUsed() const { return _framesUsed; }
     void forgetFramesUsed() { _framesUsed.clear(); }
 
 private:
     struct Side {
-        const View* view;
+        const LayoutItem* item;
         LayoutAttribute attribute;
-        const View* space; ///< in whose coordinates
+        const LayoutItem* space; ///< in whose coordinates
     };
-    std::shared_ptr<View> commonSpace(const LayoutConstraint& constraint) const;
-    bool isInTree(const View& view) const;
+    std::shared_ptr<LayoutItem> commonSpace(const LayoutConstraint& constraint) const;
+    bool isInTree(const LayoutItem& item) const;
     void add(LayoutRule& rule, const Side& side, double factor);
     void addPosition(LayoutRule& rule, const Side& side, Axis axis, double share, double factor);
-    void addLength(LayoutRule& rule, const View& view, Axis axis, double factor);
-    const LayoutVariables* variables(const View& view) const;
+    void addLength(LayoutRule& rule, const LayoutItem& item, Axis axis, double factor);
+    const LayoutVariables* variables(const LayoutItem& item) const;
 
-    const View& _root;
+    const LayoutItem& _root;
     const Variables& _variables;
-    std::unordered_set<const View*> _framesUsed;
+    std::unordered_set<const LayoutItem*> _framesUsed;
 };
 
 } // namespace platform::ui

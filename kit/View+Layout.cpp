@@ -3,10 +3,9 @@
 
 #include "kit/View.h"
 
-#include "kit/LayoutEngine.h"
+#include "kit/ViewOwner.h"
 
 #include <algorithm>
-#include <cmath>
 
 namespace platform::ui {
 
@@ -19,28 +18,19 @@ double intrinsicSide(double wanted)
 
 } // namespace
 
-View& View::layoutRoot()
+std::shared_ptr<LayoutItem> View::layoutParent() const
 {
-    if (_layoutBoundary)
-        return *this;
-    const auto above = superview();
-    return above ? above->layoutRoot() : *this;
+    return superview();
 }
 
-LayoutEngine& View::engine()
+std::vector<std::shared_ptr<LayoutItem>> View::layoutChildren() const
 {
-    if (!_engine)
-        _engine = std::make_unique<LayoutEngine>(*this);
-    return *_engine;
+    return {_subviews.begin(), _subviews.end()};
 }
 
-void View::setLayoutBoundary(bool boundary)
+std::shared_ptr<LayoutItem> View::layoutReference()
 {
-    if (boundary == _layoutBoundary)
-        return;
-    _engine.reset();
-    _layoutBoundary = boundary;
-    layoutInputDidChange();
+    return weak_from_this().lock();
 }
 
 LayoutAnchor View::anchor(LayoutAttribute attribute) const
@@ -48,55 +38,25 @@ LayoutAnchor View::anchor(LayoutAttribute attribute) const
     return {std::const_pointer_cast<View>(shared_from_this()), attribute};
 }
 
-void View::layoutInputDidChange()
-{
-    if (const auto& root = layoutRoot(); root._engine)
-        root._engine->structureDidChange();
-    markTreeForLayout();
-}
-
-void View::constraintConstantDidChange(const LayoutConstraint& constraint)
-{
-    if (const auto& root = layoutRoot(); root._engine)
-        root._engine->constantDidChange(constraint);
-    markTreeForLayout();
-}
-
 void View::invalidateIntrinsicContentSize()
 {
-    if (const auto& root = layoutRoot(); root._engine)
-        root._engine->intrinsicSizeDidChange(*this);
-    if (const auto above = superview())
-        above->_needsLayout = true;
-    setNeedsLayout();
+    LayoutItem::invalidateIntrinsicContentSize();
     changed(ViewChange::IntrinsicSize);
 }
 
-void View::setNeedsLayout()
+void View::layoutDidBecomeStale()
 {
-    _needsLayout = true;
-    markTreeForLayout();
+    changed(ViewChange::Layout);
 }
 
-/// Lets every root above know that something below is stale; a root that knows already has told its observer.
-void View::markTreeForLayout()
+void View::layOutContent()
 {
-    const auto above = superview();
-    if ((!above || _layoutBoundary) && !_treeNeedsLayout) {
-        _treeNeedsLayout = true;
-        if (!_engine || !_engine->isRunning())
-            changed(ViewChange::Layout);
-    }
-    if (above)
-        above->markTreeForLayout();
-}
-
-void View::layoutIfNeeded()
-{
-    View& root = layoutRoot();
-    const auto keepAlive = root.weak_from_this().lock();
-    if (root._treeNeedsLayout)
-        root.engine().layout();
+    const auto owner = _owner.lock();
+    if (owner)
+        owner->viewWillLayoutSubviews();
+    layoutSubviews();
+    if (owner)
+        owner->viewDidLayoutSubviews();
 }
 
 Size View::sizeThatFits(Size limit) const
@@ -110,11 +70,6 @@ void View::sizeToFit()
 {
     const Size size = sizeThatFits({});
     setFrame({_frame.x, _frame.y, intrinsicSide(size.width), intrinsicSide(size.height)});
-}
-
-Size View::systemLayoutSizeFitting(Size target)
-{
-    return LayoutEngine(*this).fittingSize(target);
 }
 
 } // namespace platform::ui

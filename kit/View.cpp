@@ -3,10 +3,7 @@
 
 #include "kit/View.h"
 
-#include "kit/LayoutEngine.h"
-#include "kit/Screen.h"
 #include "kit/ViewVisitor.h"
-#include "kit/Window.h"
 
 #include <algorithm>
 #include <cmath>
@@ -34,12 +31,8 @@ void View::setFrame(const Rect& frame)
     if (frame.size() != before) {
         for (const auto& view : _subviews)
             view->resizeWithSuperview(frame.width - before.width, frame.height - before.height);
-        if (_engine)
-            _engine->frameDidChange(*this);
-        setNeedsLayout();
     }
-    if (auto& root = layoutRoot(); root._engine && &root != this)
-        root._engine->frameDidChange(*this);
+    frameDidChange(frame.size() != before);
     changed(ViewChange::Frame);
 }
 
@@ -80,12 +73,6 @@ Point View::originInRoot() const
     return origin;
 }
 
-double View::roundToPixel(double points)
-{
-    const double scale = Screen::mainScale();
-    return std::floor(points * scale + 0.5) / scale;
-}
-
 void View::addSubview(const std::shared_ptr<View>& view)
 {
     insertSubview(view, _subviews.size());
@@ -100,13 +87,11 @@ void View::insertSubview(const std::shared_ptr<View>& view, std::size_t index)
     } else {
         view->removeFromSuperview();
         view->_superview = weak_from_this();
-        if (!view->_layoutBoundary)
-            view->_engine.reset();
     }
     _subviews.insert(
         _subviews.begin() + static_cast<std::ptrdiff_t>(std::min(index, _subviews.size())), view);
     layoutInputDidChange();
-    view->markTreeForLayout();
+    view->didJoinLayout();
     changed(ViewChange::Subviews);
 }
 
@@ -126,33 +111,11 @@ void View::removeFromSuperview()
         return;
     const auto self = shared_from_this();
     superview->willRemoveSubview(*this);
-    superview->layoutRoot().deactivateConstraintsCrossing(*this);
+    superview->deactivateConstraintsCrossing(*this);
     superview->layoutInputDidChange();
     std::erase(superview->_subviews, self);
     _superview.reset();
     superview->changed(ViewChange::Subviews);
-}
-
-/// Ends the constraints in this tree between the views of a part of it and the views outside of that part.
-void View::deactivateConstraintsCrossing(const View& part)
-{
-    const auto crosses = [&part](const std::shared_ptr<LayoutConstraint>& constraint) {
-        const auto first = constraint->first().view(), second = constraint->second().view();
-        return first && second && first->isDescendantOf(part) != second->isDescendantOf(part);
-    };
-    LayoutConstraints crossing;
-    std::copy_if(constraints().begin(), constraints().end(), std::back_inserter(crossing), crosses);
-    LayoutConstraint::deactivate(crossing);
-    for (const auto& view : _subviews)
-        view->deactivateConstraintsCrossing(part);
-}
-
-bool View::isDescendantOf(const View& view) const
-{
-    if (this == &view)
-        return true;
-    const auto above = superview();
-    return above && above->isDescendantOf(view);
 }
 
 std::shared_ptr<Window> View::window() const
@@ -161,11 +124,6 @@ std::shared_ptr<Window> View::window() const
         return window;
     const auto above = superview();
     return above ? above->window() : nullptr;
-}
-
-void View::setWindow(std::weak_ptr<Window> window)
-{
-    _window = std::move(window);
 }
 
 const TraitCollection& View::traits() const
@@ -186,9 +144,7 @@ void View::overrideTraits(std::optional<TraitCollection> traits)
 
 void View::traitsDidChange()
 {
-    if (_engine)
-        _engine->structureDidChange();
-    setNeedsLayout();
+    directionDidChange();
     changed(ViewChange::Content);
     for (const auto& view : _subviews)
         view->traitsDidChange();

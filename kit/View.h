@@ -18,8 +18,7 @@ namespace platform::ui {
 
 class Canvas;
 class GestureRecognizer;
-class LayoutEngine;
-class ViewController;
+class ViewOwner;
 class ViewVisitor;
 class Window;
 
@@ -52,12 +51,11 @@ public:
     void setObserver(std::weak_ptr<ViewObserver> observer) { _observer.set(std::move(observer)); }
 
     // Geometry: the frame is in the superview's coordinates, the bounds in the view's own. Points.
-    const Rect& frame() const { return _frame; }
-    void setFrame(const Rect& frame);
+    const Rect& frame() const override { return _frame; }
+    void setFrame(const Rect& frame) override;
     Rect bounds() const { return {_boundsOrigin.x, _boundsOrigin.y, _frame.width, _frame.height}; }
     Point convertPoint(Point point, const View& to) const; ///< both in one tree
     Rect convertRect(const Rect& rect, const View& to) const;
-    static double roundToPixel(double points); ///< the nearest edge of a device pixel
 
     // The tree. Later subviews lie in front.
     std::shared_ptr<View> superview() const { return _superview.lock(); }
@@ -66,12 +64,17 @@ public:
     void insertSubview(const std::shared_ptr<View>& view, std::size_t index);
     void bringSubviewToFront(const std::shared_ptr<View>& view);
     void removeFromSuperview();
-    bool isDescendantOf(const View& view) const; ///< a view is its own descendant
+    std::shared_ptr<LayoutItem> layoutParent() const override;
+    std::vector<std::shared_ptr<LayoutItem>> layoutChildren() const override;
+    bool isDescendantOf(const View& view) const { return isInside(view); } ///< a view is its own descendant
     std::shared_ptr<Window> window() const;
-    void setWindow(
-        std::weak_ptr<Window> window); ///< the window's affair, for the root view of a shown screen
+    /// The window's affair, for the root view of a shown screen.
+    void setWindow(std::weak_ptr<Window> window) { _window = std::move(window); }
+    /// The screen's affair, for its root view.
+    void setOwner(std::weak_ptr<ViewOwner> owner) { _owner = std::move(owner); }
     const TraitCollection& traits() const; ///< the nearest override, else the application's
     void overrideTraits(std::optional<TraitCollection> traits);
+    bool isRightToLeft() const override { return traits().isRightToLeft(); }
 
     bool isHidden() const { return _hidden; }
     void setHidden(bool hidden);
@@ -92,20 +95,12 @@ public:
     void setAccessibilityLabel(std::string label);
     const std::vector<std::shared_ptr<GestureRecognizer>>& gestureRecognizers() const { return _recognizers; }
     void addGestureRecognizer(std::shared_ptr<GestureRecognizer> recognizer);
-    const std::string& debugName() const { return _debugName; }
-    void setDebugName(std::string name) { _debugName = std::move(name); }
 
-    void setNeedsLayout();
-    void layoutIfNeeded(); ///< lays out the whole tree that the view stands in, where it is stale
     virtual void layoutSubviews() { }
     void invalidateIntrinsicContentSize() override;
     LayoutAnchor anchor(LayoutAttribute attribute) const override;
     virtual Size sizeThatFits(Size limit) const; ///< a limit of 0: none
     virtual void sizeToFit(); ///< keeps the origin
-    /// The smallest size that the constraints below allow; a positive target side is kept.
-    Size systemLayoutSizeFitting(Size target);
-    /// The root of a layout of its own: constraints inside have nothing to do with views outside.
-    void setLayoutBoundary(bool boundary);
 
     virtual bool becomeFirstResponder() { return false; } ///< a plain view never takes the focus
     virtual bool resignFirstResponder() { return true; }
@@ -116,22 +111,15 @@ protected:
     void askForFocus(bool wanted);
     std::optional<Size> nativeSize(double maxWidth) const;
     void setBoundsOrigin(Point origin);
-    void layoutInputDidChange() override;
-    void constraintConstantDidChange(const LayoutConstraint& constraint) override;
+    std::shared_ptr<LayoutItem> layoutReference() override;
+    void layOutContent() override;
+    void layoutDidBecomeStale() override;
     virtual void subviewVisibilityDidChange() { }
     virtual void willRemoveSubview(View&) { }
 
 private:
-    friend class LayoutConstraint;
-    friend class LayoutEngine;
-    friend class ViewController;
-
-    View& layoutRoot();
-    LayoutEngine& engine();
-    void markTreeForLayout();
     void traitsDidChange();
     void resizeWithSuperview(double widthChange, double heightChange);
-    void deactivateConstraintsCrossing(const View& part);
     Point originInRoot() const;
 
     Rect _frame;
@@ -140,16 +128,13 @@ private:
     std::vector<std::shared_ptr<View>> _subviews;
     std::vector<std::shared_ptr<GestureRecognizer>> _recognizers;
     std::weak_ptr<Window> _window;
-    std::weak_ptr<ViewController> _controller;
-    std::unique_ptr<LayoutEngine> _engine;
+    std::weak_ptr<ViewOwner> _owner;
     ObserverSlot<ViewObserver> _observer;
     std::optional<TraitCollection> _traits;
     ViewStyle _style;
     Accessibility _accessibility;
-    std::string _debugName;
     double _alpha = 1;
     bool _hidden = false, _enabled = true;
-    bool _needsLayout = true, _treeNeedsLayout = true, _layoutBoundary = false;
 };
 
 } // namespace platform::ui

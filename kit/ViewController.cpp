@@ -43,7 +43,7 @@ void ViewController::setView(std::shared_ptr<View> view)
 {
     _view = std::move(view);
     if (_view)
-        _view->_controller = weak_from_this();
+        _view->setOwner(weak_from_this());
 }
 
 void ViewController::loadView()

@@ -9,6 +9,7 @@
 #include "kit/Presentation.h"
 #include "kit/TraitCollection.h"
 #include "kit/ViewControllerObserver.h"
+#include "kit/ViewOwner.h"
 #include "platform/Geometry.h"
 #include "platform/StateCoder.h"
 
@@ -30,10 +31,10 @@ enum class AppearanceState { Disappeared, Appearing, Appeared, Disappearing };
 
 /// One screen: a view that is made on first demand, what surrounds it, and the screens that it contains or
 /// presents. Made with std::make_shared. Main thread only.
-class ViewController : public std::enable_shared_from_this<ViewController> {
+class ViewController : public ViewOwner, public std::enable_shared_from_this<ViewController> {
 public:
     ViewController();
-    virtual ~ViewController();
+    ~ViewController() override;
     ViewController(const ViewController&) = delete;
     ViewController& operator=(const ViewController&) = delete;
 
@@ -53,8 +54,6 @@ public:
     virtual void viewDidAppear(bool /*animated*/) { }
     virtual void viewWillDisappear(bool /*animated*/) { }
     virtual void viewDidDisappear(bool /*animated*/) { }
-    virtual void viewWillLayoutSubviews() { } ///< before the root view lays out its subviews
-    virtual void viewDidLayoutSubviews() { }
     /// The view is about to get this size. Overriders call the base class, which tells the contained screens.
     virtual void viewWillTransitionToSizeWithTransitionCoordinator(
         Size size, TransitionCoordinator& coordinator);

@@ -3,7 +3,7 @@
 
 #include "kit/VisualFormat.h"
 
-#include "kit/View.h"
+#include "kit/LayoutItem.h"
 #include "platform/Log.h"
 
 #include <cctype>
@@ -21,7 +21,7 @@ constexpr double standardMargin = 20;
 struct Predicate {
     LayoutRelation relation = LayoutRelation::Equal;
     double constant = 0;
-    std::shared_ptr<View> view; ///< the length of this view, instead of the constant
+    std::shared_ptr<LayoutItem> view; ///< the length of this view, instead of the constant
     LayoutPriority priority = LayoutPriorities::required;
 };
 
@@ -36,7 +36,7 @@ Predicates exactly(double constant)
 
 /// A view of the format, or the superview at its edge.
 struct Item {
-    std::shared_ptr<View> view;
+    std::shared_ptr<LayoutItem> view;
     bool isSuperview = false;
 };
 
@@ -228,7 +228,7 @@ private:
         _made.back()->setPriority(priority);
     }
 
-    void addLengths(const View& view, const Predicates& predicates)
+    void addLengths(const LayoutItem& view, const Predicates& predicates)
     {
         for (const auto& predicate : predicates) {
             const auto other = predicate.view ? predicate.view->anchor(length()) : LayoutAnchor();
@@ -240,7 +240,7 @@ private:
     {
         const bool atEdge = before.isSuperview || after.isSuperview;
         const auto inner = before.isSuperview ? after.view : before.view;
-        const auto superview = atEdge && inner ? inner->superview() : nullptr;
+        const auto superview = atEdge && inner ? inner->layoutParent() : nullptr;
         if (atEdge && !superview)
             return fail("the view at the edge has no superview");
         const auto near = before.isSuperview ? superview->anchor(start()) : before.view->anchor(end());
@@ -268,7 +268,7 @@ private:
     const VisualFormatInput& _input;
     std::size_t _position = 0;
     Axis _axis = Axis::Horizontal;
-    std::vector<std::shared_ptr<View>> _views;
+    std::vector<std::shared_ptr<LayoutItem>> _views;
     LayoutConstraints _made;
     std::optional<VisualFormatError> _error;
 };

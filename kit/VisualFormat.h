@@ -16,7 +16,8 @@ namespace platform::ui {
 
 /// What a visual format is read with.
 struct VisualFormatInput {
-    std::map<std::string, std::shared_ptr<View>, std::less<>> views; ///< by the names in square brackets
+    std::map<std::string, std::shared_ptr<LayoutItem>, std::less<>>
+        views; ///< by the names in square brackets
     std::map<std::string, double, std::less<>> metrics; ///< by the names in place of numbers
     /// Aligns all views of the format on this attribute (CenterY, Top, Leading, ...); None: no alignment.
     LayoutAttribute alignment = LayoutAttribute::None;
