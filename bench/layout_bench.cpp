@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "kit/Label.h"
-#include "kit/LayoutConstraint.h"
+#include "kit/layout/LayoutConstraint.h"
+#include "kit/views/Label.h"
 
 #include <benchmark/benchmark.h>
 

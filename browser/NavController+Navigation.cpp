@@ -8,7 +8,7 @@
 #include "items/DRItem.h"
 #include "items/LaunchUtils.h"
 #include "items/UrlResolution.h"
-#include "kit/SearchPresentation.h"
+#include "kit/controllers/SearchPresentation.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
 #include "platform/Localization.h"

@@ -5,7 +5,7 @@
 
 #include "browser/ListLogging.h"
 #include "items/DRItem.h"
-#include "kit/View.h"
+#include "kit/views/View.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
 #include "platform/Formatters.h"

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/NavigationController.h"
+#include "kit/controllers/NavigationController.h"
 #include "platform/Date.h"
 #include "platform/NotificationCenter.h"
 #include "prompts/DocumentListControllerStatusBar.h"

@@ -4,7 +4,7 @@
 #include "preview/LookwellItemController.h"
 
 #include "items/DRItem.h"
-#include "kit/View.h"
+#include "kit/views/View.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"

@@ -3,9 +3,9 @@
 
 #pragma once
 
-#include "kit/BarButtonItem.h"
-#include "kit/LayoutConstraint.h"
-#include "kit/ViewController.h"
+#include "kit/controllers/BarButtonItem.h"
+#include "kit/controllers/ViewController.h"
+#include "kit/layout/LayoutConstraint.h"
 #include "platform/Geometry.h"
 #include "preview/PreviewMode.h"
 

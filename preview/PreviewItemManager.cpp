@@ -7,7 +7,7 @@
 #include "preview/PreviewItemManager.h"
 
 #include "items/DRItem.h"
-#include "kit/SearchPresentation.h"
+#include "kit/controllers/SearchPresentation.h"
 #include "platform/Dispatch.h"
 #include "platform/FileSystem.h"
 #include "platform/Log.h"

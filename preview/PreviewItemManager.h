@@ -3,8 +3,8 @@
 
 #pragma once
 
-#include "kit/NavigationController.h"
-#include "kit/ViewController.h"
+#include "kit/controllers/NavigationController.h"
+#include "kit/controllers/ViewController.h"
 #include "platform/Date.h"
 #include "platform/FilePresenter.h"
 #include "platform/NotificationCenter.h"

@@ -3,8 +3,8 @@
 
 #include "prompts/DocumentListControllerStatusBar.h"
 
-#include "kit/Label.h"
-#include "kit/Screen.h"
+#include "kit/values/Screen.h"
+#include "kit/views/Label.h"
 #include "platform/Log.h"
 #include "prompts/DriveStatusLabelView.h"
 #include "screens/StorageUpgradeButton.h"

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/BarButtonItem.h"
+#include "kit/controllers/BarButtonItem.h"
 #include "platform/StorageOffers.h"
 
 #include <memory>

@@ -3,7 +3,7 @@
 
 #include "prompts/DriveStatusLabelView.h"
 
-#include "kit/Label.h"
+#include "kit/views/Label.h"
 #include "screens/StorageUpgradeButton.h"
 
 #include <algorithm>

@@ -4,9 +4,9 @@
 #include "prompts/FilenamePrompt.h"
 
 #include "items/FileUtils.h"
-#include "kit/AlertController.h"
-#include "kit/LayoutConstraint.h"
-#include "kit/TextField.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/layout/LayoutConstraint.h"
+#include "kit/views/TextField.h"
 #include "platform/Localization.h"
 #include "prompts/SimpleTextViewController.h"
 #include "prompts/UIUtils.h"

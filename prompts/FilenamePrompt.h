@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/TextFieldDelegate.h"
+#include "kit/views/TextFieldDelegate.h"
 
 #include <functional>
 #include <memory>

@@ -3,9 +3,9 @@
 
 #include "prompts/SimpleTextViewController.h"
 
-#include "kit/Label.h"
-#include "kit/LayoutConstraint.h"
-#include "kit/StandardColors.h"
+#include "kit/layout/LayoutConstraint.h"
+#include "kit/values/StandardColors.h"
+#include "kit/views/Label.h"
 
 namespace tarrow {
 

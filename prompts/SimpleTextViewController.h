@@ -3,8 +3,8 @@
 
 #pragma once
 
-#include "kit/Font.h"
-#include "kit/ViewController.h"
+#include "kit/controllers/ViewController.h"
+#include "kit/values/Font.h"
 
 namespace platform::ui {
 class Label;

@@ -2,9 +2,9 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "items/DRItem.h"
-#include "kit/AlertController.h"
-#include "kit/BarButtonItem.h"
-#include "kit/View.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/controllers/BarButtonItem.h"
+#include "kit/views/View.h"
 #include "platform/Localization.h"
 #include "prompts/UIUtils.h"
 

@@ -3,7 +3,7 @@
 
 #include "items/FileUtils.h"
 #include "items/UrlResolution.h"
-#include "kit/TextField.h"
+#include "kit/views/TextField.h"
 #include "prompts/UIUtils.h"
 
 #include <algorithm>

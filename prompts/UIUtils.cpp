@@ -3,9 +3,9 @@
 
 #include "prompts/UIUtils.h"
 
-#include "kit/AlertController.h"
-#include "kit/Screen.h"
-#include "kit/View.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/values/Screen.h"
+#include "kit/views/View.h"
 #include "platform/Localization.h"
 
 namespace tarrow {

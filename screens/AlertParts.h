@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/AlertController.h"
+#include "kit/controllers/AlertController.h"
 
 #include <functional>
 #include <memory>

@@ -3,7 +3,7 @@
 
 #include "screens/DocumentInteractionSheet.h"
 
-#include "kit/AlertController.h"
+#include "kit/controllers/AlertController.h"
 #include "platform/DocumentSharing.h"
 #include "platform/FileSystem.h"
 #include "platform/Localization.h"

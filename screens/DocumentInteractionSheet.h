@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/PopoverAnchor.h"
+#include "kit/controllers/PopoverAnchor.h"
 #include "platform/AppRegistry.h"
 #include "platform/Error.h"
 #include "platform/Geometry.h"

@@ -3,11 +3,11 @@
 
 #include "screens/PlaceholderView.h"
 
-#include "kit/ActivityIndicator.h"
-#include "kit/ImageView.h"
-#include "kit/Label.h"
-#include "kit/StackView.h"
-#include "kit/StandardColors.h"
+#include "kit/values/StandardColors.h"
+#include "kit/views/ActivityIndicator.h"
+#include "kit/views/ImageView.h"
+#include "kit/views/Label.h"
+#include "kit/views/StackView.h"
 
 #include <initializer_list>
 

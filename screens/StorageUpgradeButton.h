@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/Button.h"
+#include "kit/views/Button.h"
 #include "platform/StorageOffers.h"
 
 #include <memory>

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/ViewController.h"
+#include "kit/controllers/ViewController.h"
 
 #include <memory>
 

@@ -3,7 +3,7 @@
 
 #include "screens/UpgradeFlow.h"
 
-#include "kit/AlertController.h"
+#include "kit/controllers/AlertController.h"
 #include "platform/LinkOpener.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"

@@ -3,9 +3,9 @@
 
 #include "screens/list/DocumentListController.h"
 
-#include "kit/AlertAction.h"
-#include "kit/AlertController.h"
-#include "kit/ListView.h"
+#include "kit/controllers/AlertAction.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/views/ListView.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"

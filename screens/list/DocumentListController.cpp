@@ -3,9 +3,9 @@
 
 #include "screens/list/DocumentListController.h"
 
-#include "kit/ListView.h"
-#include "kit/NavigationController.h"
-#include "kit/NavigationItem.h"
+#include "kit/controllers/NavigationController.h"
+#include "kit/controllers/NavigationItem.h"
+#include "kit/views/ListView.h"
 #include "platform/Dispatch.h"
 #include "platform/FolderLister.h"
 #include "platform/Localization.h"

@@ -3,8 +3,8 @@
 
 #pragma once
 
-#include "kit/ListViewDelegate.h"
-#include "kit/ViewController.h"
+#include "kit/controllers/ViewController.h"
+#include "kit/views/ListViewDelegate.h"
 #include "platform/Error.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"

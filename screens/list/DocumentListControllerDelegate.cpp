@@ -3,7 +3,7 @@
 
 #include "screens/list/DocumentListControllerDelegate.h"
 
-#include "kit/StandardColors.h"
+#include "kit/values/StandardColors.h"
 
 namespace platform::components {
 

@@ -3,9 +3,9 @@
 
 #include "screens/list/DocumentPeek.h"
 
-#include "kit/AlertController.h"
-#include "kit/TapRecognizer.h"
-#include "kit/View.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/views/TapRecognizer.h"
+#include "kit/views/View.h"
 #include "platform/Localization.h"
 
 #include <utility>

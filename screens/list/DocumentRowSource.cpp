@@ -3,7 +3,7 @@
 
 #include "screens/list/DocumentRowSource.h"
 
-#include "kit/ListView.h"
+#include "kit/views/ListView.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/ListViewDataSource.h"
+#include "kit/views/ListViewDataSource.h"
 #include "platform/Color.h"
 #include "platform/NotificationCenter.h"
 #include "screens/list/DocumentRows.h"

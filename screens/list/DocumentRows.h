@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/ListChanges.h"
+#include "kit/values/ListChanges.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
 #include "screens/list/SnapshotOrder.h"

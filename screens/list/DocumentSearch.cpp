@@ -3,7 +3,7 @@
 
 #include "screens/list/DocumentSearch.h"
 
-#include "kit/ListView.h"
+#include "kit/views/ListView.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "screens/FolderPlaces.h"

@@ -3,8 +3,8 @@
 
 #pragma once
 
-#include "kit/ListViewDelegate.h"
-#include "kit/SearchPresentation.h"
+#include "kit/controllers/SearchPresentation.h"
+#include "kit/views/ListViewDelegate.h"
 #include "platform/NameSearch.h"
 #include "platform/Url.h"
 #include "screens/list/DocumentRows.h"

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/ListRow.h"
+#include "kit/values/ListRow.h"
 #include "platform/Date.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/ListRow.h"
+#include "kit/values/ListRow.h"
 #include "platform/Dispatch.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Services.h"

@@ -3,8 +3,8 @@
 
 #include "screens/move/FolderNameAlert.h"
 
-#include "kit/AlertController.h"
-#include "kit/TextField.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/views/TextField.h"
 #include "platform/Localization.h"
 
 #include <utility>

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/NavigationController.h"
+#include "kit/controllers/NavigationController.h"
 #include "platform/Url.h"
 
 #include <memory>

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/ListViewDataSource.h"
+#include "kit/views/ListViewDataSource.h"
 #include "platform/FolderSnapshot.h"
 
 #include <functional>

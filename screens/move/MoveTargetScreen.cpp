@@ -3,9 +3,9 @@
 
 #include "screens/move/MoveTargetScreen.h"
 
-#include "kit/AlertController.h"
-#include "kit/ListView.h"
-#include "kit/NavigationItem.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/controllers/NavigationItem.h"
+#include "kit/views/ListView.h"
 #include "platform/FileCoordinator.h"
 #include "platform/FileSystem.h"
 #include "platform/Localization.h"

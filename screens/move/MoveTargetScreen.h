@@ -3,8 +3,8 @@
 
 #pragma once
 
-#include "kit/ListViewDelegate.h"
-#include "kit/ViewController.h"
+#include "kit/controllers/ViewController.h"
+#include "kit/views/ListViewDelegate.h"
 #include "platform/Dispatch.h"
 #include "platform/FolderLister.h"
 #include "screens/move/MoveTargetRows.h"

@@ -3,8 +3,8 @@
 
 #pragma once
 
-#include "kit/HostedView.h"
-#include "kit/ViewController.h"
+#include "kit/controllers/ViewController.h"
+#include "kit/views/HostedView.h"
 
 #include <memory>
 #include <string>

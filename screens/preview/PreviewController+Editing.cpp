@@ -3,7 +3,7 @@
 
 // Changing the document that is shown, and what becomes of the edits.
 
-#include "kit/NavigationController.h"
+#include "kit/controllers/NavigationController.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "screens/AlertParts.h"

@@ -3,10 +3,10 @@
 
 #include "screens/preview/PreviewController.h"
 
-#include "kit/Button.h"
-#include "kit/NavigationController.h"
-#include "kit/NavigationItem.h"
-#include "kit/TextField.h"
+#include "kit/controllers/NavigationController.h"
+#include "kit/controllers/NavigationItem.h"
+#include "kit/views/Button.h"
+#include "kit/views/TextField.h"
 #include "platform/Dispatch.h"
 #include "platform/FileSystem.h"
 #include "platform/ItemDownload.h"

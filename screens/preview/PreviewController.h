@@ -3,8 +3,8 @@
 
 #pragma once
 
-#include "kit/BarButtonItem.h"
-#include "kit/ViewController.h"
+#include "kit/controllers/BarButtonItem.h"
+#include "kit/controllers/ViewController.h"
 #include "platform/Error.h"
 #include "platform/FileSystem.h"
 #include "platform/NotificationCenter.h"

@@ -3,7 +3,7 @@
 
 #include "screens/preview/PreviewEditBar.h"
 
-#include "kit/Button.h"
+#include "kit/views/Button.h"
 #include "platform/Localization.h"
 
 #include <algorithm>

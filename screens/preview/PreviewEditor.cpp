@@ -3,8 +3,8 @@
 
 #include "screens/preview/PreviewEditor.h"
 
-#include "kit/Button.h"
-#include "kit/TextField.h"
+#include "kit/views/Button.h"
+#include "kit/views/TextField.h"
 #include "platform/Localization.h"
 #include "screens/AlertParts.h"
 #include "screens/preview/NoteView.h"

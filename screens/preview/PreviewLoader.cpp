@@ -3,7 +3,7 @@
 
 #include "screens/preview/PreviewLoader.h"
 
-#include "kit/Screen.h"
+#include "kit/values/Screen.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/FileCoordinator.h"
 #include "platform/FileSystem.h"

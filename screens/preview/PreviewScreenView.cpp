@@ -3,8 +3,8 @@
 
 #include "screens/preview/PreviewScreenView.h"
 
-#include "kit/Label.h"
-#include "kit/StandardColors.h"
+#include "kit/values/StandardColors.h"
+#include "kit/views/Label.h"
 #include "screens/preview/PreviewFieldBar.h"
 #include "screens/preview/PreviewSearchBar.h"
 #include "screens/preview/PreviewToolbar.h"

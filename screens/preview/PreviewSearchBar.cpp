@@ -3,9 +3,9 @@
 
 #include "screens/preview/PreviewSearchBar.h"
 
-#include "kit/Button.h"
-#include "kit/Label.h"
-#include "kit/TextField.h"
+#include "kit/views/Button.h"
+#include "kit/views/Label.h"
+#include "kit/views/TextField.h"
 #include "platform/Dispatch.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"

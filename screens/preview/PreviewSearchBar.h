@@ -3,8 +3,8 @@
 
 #pragma once
 
-#include "kit/TextFieldDelegate.h"
-#include "kit/View.h"
+#include "kit/views/TextFieldDelegate.h"
+#include "kit/views/View.h"
 
 #include <functional>
 #include <memory>

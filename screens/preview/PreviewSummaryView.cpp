@@ -3,12 +3,12 @@
 
 #include "screens/preview/PreviewSummaryView.h"
 
-#include "kit/ActivityIndicator.h"
-#include "kit/Button.h"
-#include "kit/ImageView.h"
-#include "kit/Label.h"
-#include "kit/StackView.h"
-#include "kit/StandardColors.h"
+#include "kit/values/StandardColors.h"
+#include "kit/views/ActivityIndicator.h"
+#include "kit/views/Button.h"
+#include "kit/views/ImageView.h"
+#include "kit/views/Label.h"
+#include "kit/views/StackView.h"
 
 #include <algorithm>
 #include <initializer_list>

@@ -3,8 +3,8 @@
 
 #include "screens/preview/PreviewToolbar.h"
 
-#include "kit/Button.h"
-#include "kit/Label.h"
+#include "kit/views/Button.h"
+#include "kit/views/Label.h"
 #include "platform/Localization.h"
 #include "screens/preview/PreviewPagesView.h"
 

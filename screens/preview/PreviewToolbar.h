@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/View.h"
+#include "kit/views/View.h"
 
 #include <functional>
 #include <memory>

@@ -3,8 +3,8 @@
 
 #pragma once
 
-#include "kit/HostedView.h"
-#include "kit/ObserverSlot.h"
+#include "kit/values/ObserverSlot.h"
+#include "kit/views/HostedView.h"
 #include "platform/Geometry.h"
 
 #include <cstddef>

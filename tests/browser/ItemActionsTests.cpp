@@ -1,12 +1,12 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "kit/AlertController.h"
-#include "kit/BarButtonItem.h"
-#include "kit/Button.h"
-#include "kit/Label.h"
-#include "kit/TextField.h"
-#include "kit/View.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/controllers/BarButtonItem.h"
+#include "kit/views/Button.h"
+#include "kit/views/Label.h"
+#include "kit/views/TextField.h"
+#include "kit/views/View.h"
 #include "prompts/FilenamePrompt.h"
 #include "prompts/SimpleTextViewController.h"
 #include "screens/list/DocumentListAction.h"

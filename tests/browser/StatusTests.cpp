@@ -3,7 +3,7 @@
 
 #include "browser/NavController.h"
 #include "drawing/FileTags.h"
-#include "kit/Label.h"
+#include "kit/views/Label.h"
 #include "preview/PreviewMode.h"
 #include "prompts/DriveStatusLabelView.h"
 #include "screens/StorageUpgradeButton.h"

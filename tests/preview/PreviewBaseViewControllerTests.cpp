@@ -4,11 +4,11 @@
 #include "preview/PreviewBaseViewController.h"
 
 #include "PreviewFixture.h"
-#include "kit/AlertController.h"
-#include "kit/Button.h"
-#include "kit/NavigationItem.h"
-#include "kit/Screen.h"
-#include "kit/ScrollView.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/controllers/NavigationItem.h"
+#include "kit/values/Screen.h"
+#include "kit/views/Button.h"
+#include "kit/views/ScrollView.h"
 #include "screens/DocumentInteractionSheet.h"
 #include "screens/PlaceholderView.h"
 

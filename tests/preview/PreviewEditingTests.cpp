@@ -2,9 +2,9 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "PreviewFixture.h"
-#include "kit/AlertController.h"
-#include "kit/Button.h"
-#include "kit/TextField.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/views/Button.h"
+#include "kit/views/TextField.h"
 #include "platform/FileSystem.h"
 #include "platform/PagedDocumentEditing.h"
 #include "screens/preview/NoteView.h"

@@ -4,8 +4,8 @@
 #pragma once
 
 #include "items/DRItem.h"
-#include "kit/NavigationController.h"
-#include "kit/Window.h"
+#include "kit/controllers/NavigationController.h"
+#include "kit/controllers/Window.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewDetailsViewController.h"
 #include "preview/PreviewItemManager.h"

@@ -5,7 +5,7 @@
 
 #include "PreviewFixture.h"
 #include "items/DRItem.h"
-#include "kit/SearchPresentation.h"
+#include "kit/controllers/SearchPresentation.h"
 #include "preview/LookwellItemController.h"
 #include "screens/preview/PreviewContent.h"
 

@@ -3,7 +3,7 @@
 
 #include "PreviewFixture.h"
 #include "items/FileUtils.h"
-#include "kit/AlertController.h"
+#include "kit/controllers/AlertController.h"
 #include "platform/ActivityHandOver.h"
 #include "screens/PlaceholderView.h"
 #include "screens/preview/PreviewContent.h"

@@ -2,10 +2,10 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "host/system/texts/UnicodeCharacterData.h"
-#include "kit/AlertController.h"
-#include "kit/Label.h"
-#include "kit/TextField.h"
-#include "kit/Window.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/controllers/Window.h"
+#include "kit/views/Label.h"
+#include "kit/views/TextField.h"
 #include "platform/Services.h"
 #include "prompts/NewFolderPrompt.h"
 #include "prompts/RenamePrompt.h"

@@ -1,10 +1,10 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "kit/AlertController.h"
-#include "kit/BarButtonItem.h"
-#include "kit/View.h"
-#include "kit/Window.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/controllers/BarButtonItem.h"
+#include "kit/controllers/Window.h"
+#include "kit/views/View.h"
 #include "prompts/UIUtils.h"
 #include "screens/list/DocumentListController.h"
 #include "tests/support/DriveFixture.h"

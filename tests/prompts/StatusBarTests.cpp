@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "kit/Label.h"
-#include "kit/Screen.h"
+#include "kit/values/Screen.h"
+#include "kit/views/Label.h"
 #include "platform/Services.h"
 #include "prompts/DocumentListControllerStatusBar.h"
 #include "prompts/DriveStatusLabelView.h"

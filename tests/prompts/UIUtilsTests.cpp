@@ -1,10 +1,10 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "kit/AlertController.h"
-#include "kit/Screen.h"
-#include "kit/View.h"
-#include "kit/Window.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/controllers/Window.h"
+#include "kit/values/Screen.h"
+#include "kit/views/View.h"
 #include "platform/Services.h"
 #include "prompts/UIUtils.h"
 #include "tests/support/PlainTexts.h"

@@ -3,8 +3,8 @@
 
 #include "tests/screens/support/ComponentsFixture.h"
 
-#include "kit/AlertController.h"
-#include "kit/View.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/views/View.h"
 #include "platform/Localization.h"
 #include "screens/DocumentInteractionSheet.h"
 

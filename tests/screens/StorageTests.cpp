@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "kit/AlertController.h"
-#include "kit/Window.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/controllers/Window.h"
 #include "screens/StorageUpgradeButton.h"
 #include "screens/UpgradeFlow.h"
 #include "tests/screens/support/ComponentsFixture.h"

@@ -4,7 +4,7 @@
 #pragma once
 
 #include "host/gtk/base/Theme.h"
-#include "kit/Canvas.h"
+#include "kit/values/Canvas.h"
 
 #include <cairo.h>
 

@@ -3,8 +3,8 @@
 
 #include "host/gtk/base/GestureFeed.h"
 
-#include "kit/GestureRecognizer.h"
-#include "kit/View.h"
+#include "kit/views/GestureRecognizer.h"
+#include "kit/views/View.h"
 
 #include <chrono>
 

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/Menu.h"
+#include "kit/values/Menu.h"
 
 #include <gtk/gtk.h>
 

@@ -4,7 +4,7 @@
 #pragma once
 
 #include "host/gtk/base/Theme.h"
-#include "kit/TextMeasurer.h"
+#include "kit/values/TextMeasurer.h"
 
 #include <memory>
 

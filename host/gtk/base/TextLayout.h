@@ -5,8 +5,8 @@
 
 #include "host/gtk/base/ObjectRef.h"
 #include "host/gtk/base/Theme.h"
-#include "kit/AttributedText.h"
-#include "kit/TextMeasurer.h"
+#include "kit/values/AttributedText.h"
+#include "kit/values/TextMeasurer.h"
 
 #include <pango/pangocairo.h>
 

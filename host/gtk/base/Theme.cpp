@@ -3,7 +3,7 @@
 
 #include "host/gtk/base/Theme.h"
 
-#include "kit/StandardColors.h"
+#include "kit/values/StandardColors.h"
 
 #include <adwaita.h>
 

@@ -5,7 +5,7 @@
 
 #include "host/gtk/base/ObjectRef.h"
 #include "host/gtk/base/Signal.h"
-#include "kit/Font.h"
+#include "kit/values/Font.h"
 #include "platform/Color.h"
 
 #include <gtk/gtk.h>

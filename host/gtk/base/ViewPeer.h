@@ -6,7 +6,7 @@
 #include "host/gtk/base/CanvasWidget.h"
 #include "host/gtk/base/ObjectRef.h"
 #include "host/gtk/base/PeerContext.h"
-#include "kit/View.h"
+#include "kit/views/View.h"
 
 #include <functional>
 #include <memory>

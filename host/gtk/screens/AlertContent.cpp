@@ -6,8 +6,8 @@
 #include "host/gtk/screens/BarItemPeer.h"
 #include "host/gtk/screens/ScrolledBody.h"
 #include "host/gtk/views/TextFieldPeer.h"
-#include "kit/HostedView.h"
-#include "kit/TextField.h"
+#include "kit/views/HostedView.h"
+#include "kit/views/TextField.h"
 
 #include <algorithm>
 

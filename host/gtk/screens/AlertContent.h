@@ -6,7 +6,7 @@
 #include "host/gtk/base/ObjectRef.h"
 #include "host/gtk/base/PeerContext.h"
 #include "host/gtk/screens/LayerContent.h"
-#include "kit/AlertController.h"
+#include "kit/controllers/AlertController.h"
 
 #include <memory>
 #include <vector>

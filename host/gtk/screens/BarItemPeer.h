@@ -5,7 +5,7 @@
 
 #include "host/gtk/base/PeerContext.h"
 #include "host/gtk/base/Signal.h"
-#include "kit/BarButtonItem.h"
+#include "kit/controllers/BarButtonItem.h"
 
 #include <memory>
 

@@ -4,7 +4,7 @@
 #pragma once
 
 #include "host/gtk/screens/WindowPeer.h"
-#include "kit/WindowHost.h"
+#include "kit/controllers/WindowHost.h"
 
 #include <functional>
 #include <memory>

@@ -9,8 +9,8 @@
 #include "host/gtk/screens/PopoverLayer.h"
 #include "host/gtk/screens/ScreenPeer.h"
 #include "host/gtk/screens/SearchContent.h"
-#include "kit/NavigationController.h"
-#include "kit/ViewControllerVisitor.h"
+#include "kit/controllers/NavigationController.h"
+#include "kit/controllers/ViewControllerVisitor.h"
 
 #include <cmath>
 #include <optional>

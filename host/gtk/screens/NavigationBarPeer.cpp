@@ -5,7 +5,7 @@
 
 #include "host/gtk/base/MenuPopover.h"
 #include "host/gtk/views/ButtonPeer.h"
-#include "kit/NavigationItem.h"
+#include "kit/controllers/NavigationItem.h"
 #include "platform/Localization.h"
 
 #include <adwaita.h>

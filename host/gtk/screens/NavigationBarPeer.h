@@ -5,7 +5,7 @@
 
 #include "host/gtk/screens/BarItemPeer.h"
 
-#include "kit/Menu.h"
+#include "kit/values/Menu.h"
 
 #include <functional>
 #include <vector>

@@ -4,7 +4,7 @@
 #include "host/gtk/screens/NavigationPeer.h"
 
 #include "host/gtk/base/ViewPeer.h"
-#include "kit/NavigationController.h"
+#include "kit/controllers/NavigationController.h"
 
 #include <algorithm>
 

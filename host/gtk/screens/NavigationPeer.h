@@ -5,8 +5,8 @@
 
 #include "host/gtk/base/SizedBin.h"
 #include "host/gtk/screens/ScreenPage.h"
-#include "kit/NavigationObserver.h"
-#include "kit/ViewObserver.h"
+#include "kit/controllers/NavigationObserver.h"
+#include "kit/views/ViewObserver.h"
 
 #include <adwaita.h>
 

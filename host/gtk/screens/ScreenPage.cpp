@@ -4,9 +4,9 @@
 #include "host/gtk/screens/ScreenPage.h"
 
 #include "host/gtk/base/ViewPeer.h"
-#include "kit/NavigationController.h"
-#include "kit/NavigationItem.h"
-#include "kit/TraitCollection.h"
+#include "kit/controllers/NavigationController.h"
+#include "kit/controllers/NavigationItem.h"
+#include "kit/values/TraitCollection.h"
 
 namespace host::gtk {
 

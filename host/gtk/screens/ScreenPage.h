@@ -6,7 +6,7 @@
 #include "host/gtk/screens/NavigationBarPeer.h"
 #include "host/gtk/screens/ScreenPeer.h"
 #include "host/gtk/screens/ToolbarPeer.h"
-#include "kit/ViewControllerObserver.h"
+#include "kit/controllers/ViewControllerObserver.h"
 
 #include <memory>
 

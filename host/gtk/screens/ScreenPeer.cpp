@@ -5,10 +5,10 @@
 
 #include "host/gtk/base/ViewPeer.h"
 #include "host/gtk/screens/NavigationPeer.h"
-#include "kit/AlertController.h"
-#include "kit/NavigationController.h"
-#include "kit/SearchPresentation.h"
-#include "kit/ViewControllerVisitor.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/controllers/NavigationController.h"
+#include "kit/controllers/SearchPresentation.h"
+#include "kit/controllers/ViewControllerVisitor.h"
 
 namespace host::gtk {
 

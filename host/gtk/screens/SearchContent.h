@@ -6,7 +6,7 @@
 #include "host/gtk/base/PeerContext.h"
 #include "host/gtk/screens/LayerContent.h"
 #include "host/gtk/screens/ScreenPeer.h"
-#include "kit/SearchPresentation.h"
+#include "kit/controllers/SearchPresentation.h"
 
 #include <memory>
 

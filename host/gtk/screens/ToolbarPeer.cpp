@@ -3,7 +3,7 @@
 
 #include "host/gtk/screens/ToolbarPeer.h"
 
-#include "kit/View.h"
+#include "kit/views/View.h"
 
 #include <algorithm>
 

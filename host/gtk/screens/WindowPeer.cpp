@@ -6,7 +6,7 @@
 #include "host/gtk/preview/NoteNative.h"
 #include "host/gtk/preview/PreviewNative.h"
 #include "host/gtk/screens/LayerFactory.h"
-#include "kit/ViewController.h"
+#include "kit/controllers/ViewController.h"
 #include "platform/Localization.h"
 
 #include <algorithm>

@@ -8,7 +8,7 @@
 #include "host/gtk/base/SizedBin.h"
 #include "host/gtk/screens/PresentedLayer.h"
 #include "host/gtk/screens/ScreenPeer.h"
-#include "kit/Window.h"
+#include "kit/controllers/Window.h"
 
 #include <adwaita.h>
 

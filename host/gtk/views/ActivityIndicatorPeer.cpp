@@ -3,7 +3,7 @@
 
 #include "host/gtk/views/ActivityIndicatorPeer.h"
 
-#include "kit/ActivityIndicator.h"
+#include "kit/views/ActivityIndicator.h"
 
 namespace host::gtk {
 

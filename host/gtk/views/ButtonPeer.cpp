@@ -5,7 +5,7 @@
 
 #include "host/gtk/base/ImagePaint.h"
 #include "host/gtk/views/LabelPeer.h"
-#include "kit/Button.h"
+#include "kit/views/Button.h"
 
 #include <algorithm>
 

@@ -3,7 +3,7 @@
 
 #include "host/gtk/views/HostedViewPeer.h"
 
-#include "kit/HostedView.h"
+#include "kit/views/HostedView.h"
 
 namespace host::gtk {
 

@@ -4,7 +4,7 @@
 #include "host/gtk/views/ImageViewPeer.h"
 
 #include "host/gtk/base/ImagePaint.h"
-#include "kit/ImageView.h"
+#include "kit/views/ImageView.h"
 
 #include <algorithm>
 

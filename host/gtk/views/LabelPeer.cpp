@@ -4,7 +4,7 @@
 #include "host/gtk/views/LabelPeer.h"
 
 #include "host/gtk/base/TextLayout.h"
-#include "kit/Label.h"
+#include "kit/views/Label.h"
 
 namespace host::gtk {
 

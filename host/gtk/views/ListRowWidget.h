@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "kit/ListRow.h"
+#include "kit/values/ListRow.h"
 
 #include <functional>
 

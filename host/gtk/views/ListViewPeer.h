@@ -4,8 +4,8 @@
 #pragma once
 
 #include "host/gtk/base/ViewPeer.h"
-#include "kit/ListView.h"
-#include "kit/TypeAhead.h"
+#include "kit/values/TypeAhead.h"
+#include "kit/views/ListView.h"
 
 #include <optional>
 #include <unordered_set>

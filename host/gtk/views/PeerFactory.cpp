@@ -10,13 +10,13 @@
 #include "host/gtk/views/ListViewPeer.h"
 #include "host/gtk/views/ScrollViewPeer.h"
 #include "host/gtk/views/TextFieldPeer.h"
-#include "kit/ActivityIndicator.h"
-#include "kit/Button.h"
-#include "kit/HostedView.h"
-#include "kit/ImageView.h"
-#include "kit/ListView.h"
-#include "kit/TextField.h"
-#include "kit/ViewVisitor.h"
+#include "kit/views/ActivityIndicator.h"
+#include "kit/views/Button.h"
+#include "kit/views/HostedView.h"
+#include "kit/views/ImageView.h"
+#include "kit/views/ListView.h"
+#include "kit/views/TextField.h"
+#include "kit/views/ViewVisitor.h"
 
 namespace host::gtk {
 

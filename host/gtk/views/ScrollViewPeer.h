@@ -4,7 +4,7 @@
 #pragma once
 
 #include "host/gtk/base/ViewPeer.h"
-#include "kit/ScrollView.h"
+#include "kit/views/ScrollView.h"
 
 namespace host::gtk {
 

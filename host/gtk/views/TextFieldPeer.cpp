@@ -4,7 +4,7 @@
 #include "host/gtk/views/TextFieldPeer.h"
 
 #include "host/gtk/base/TextLayout.h"
-#include "kit/TextField.h"
+#include "kit/views/TextField.h"
 
 #include <algorithm>
 

@@ -2,11 +2,11 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "WindowFixture.h"
-#include "kit/Button.h"
-#include "kit/Label.h"
-#include "kit/StackView.h"
-#include "kit/TextField.h"
-#include "kit/ViewController.h"
+#include "kit/controllers/ViewController.h"
+#include "kit/views/Button.h"
+#include "kit/views/Label.h"
+#include "kit/views/StackView.h"
+#include "kit/views/TextField.h"
 #include "platform/Color.h"
 
 #include <gmock/gmock.h>

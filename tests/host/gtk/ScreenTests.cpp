@@ -4,10 +4,10 @@
 #include "WindowFixture.h"
 #include "host/gtk/views/ListRowWidget.h"
 #include "host/gtk/views/ListViewPeer.h"
-#include "kit/AlertController.h"
-#include "kit/ListView.h"
-#include "kit/NavigationItem.h"
-#include "kit/TextField.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/controllers/NavigationItem.h"
+#include "kit/views/ListView.h"
+#include "kit/views/TextField.h"
 
 #include <gmock/gmock.h>
 

@@ -5,8 +5,8 @@
 
 #include "GtkEnvironment.h"
 #include "host/previews/MakePreviewLibraries.h"
-#include "kit/NavigationItem.h"
-#include "kit/ViewController.h"
+#include "kit/controllers/NavigationItem.h"
+#include "kit/controllers/ViewController.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Services.h"
 #include "tests/support/PlainTexts.h"

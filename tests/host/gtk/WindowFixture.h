@@ -7,8 +7,8 @@
 #include "host/gtk/preview/PreviewModule.h"
 #include "host/gtk/screens/GtkWindowHost.h"
 #include "host/gtk/screens/NavigationPeer.h"
-#include "kit/NavigationController.h"
-#include "kit/Window.h"
+#include "kit/controllers/NavigationController.h"
+#include "kit/controllers/Window.h"
 
 #include <gtest/gtest.h>
 

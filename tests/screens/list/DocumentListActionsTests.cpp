@@ -5,9 +5,9 @@
 
 #include "tests/screens/support/DocumentListFixture.h"
 
-#include "kit/AlertController.h"
-#include "kit/NavigationItem.h"
-#include "kit/SearchPresentation.h"
+#include "kit/controllers/AlertController.h"
+#include "kit/controllers/NavigationItem.h"
+#include "kit/controllers/SearchPresentation.h"
 #include "screens/FolderPlaces.h"
 
 #include <map>

@@ -6,7 +6,7 @@
 #include "tests/screens/support/DocumentListFixture.h"
 
 #include "host/drive/records/ItemFacts.h"
-#include "kit/AlertController.h"
+#include "kit/controllers/AlertController.h"
 #include "platform/Localization.h"
 #include "screens/list/RowThumbnail.h"
 

@@ -5,7 +5,7 @@
 
 #include "tests/screens/support/DocumentListFixture.h"
 
-#include "kit/NavigationItem.h"
+#include "kit/controllers/NavigationItem.h"
 #include "screens/PlaceholderView.h"
 #include "screens/UnavailableScreen.h"
 

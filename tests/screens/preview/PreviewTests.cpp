@@ -2,11 +2,11 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "host/previews/UchardetDecoder.h"
-#include "kit/Button.h"
-#include "kit/Label.h"
-#include "kit/NavigationController.h"
-#include "kit/Screen.h"
-#include "kit/TextField.h"
+#include "kit/controllers/NavigationController.h"
+#include "kit/values/Screen.h"
+#include "kit/views/Button.h"
+#include "kit/views/Label.h"
+#include "kit/views/TextField.h"
 #include "screens/preview/PreviewContent.h"
 #include "screens/preview/PreviewController.h"
 #include "screens/preview/PreviewLoader.h"

@@ -5,7 +5,7 @@
 
 #include "host/system/desktop/MimeTypeRegistry.h"
 #include "host/system/listing/ThreadedFolderLister.h"
-#include "kit/ListView.h"
+#include "kit/views/ListView.h"
 
 #include <chrono>
 #include <utility>

@@ -4,8 +4,8 @@
 #pragma once
 
 #include "host/drive/records/ContainerRecord.h"
-#include "kit/ListView.h"
-#include "kit/ListViewObserver.h"
+#include "kit/views/ListView.h"
+#include "kit/views/ListViewObserver.h"
 #include "tests/screens/support/ComponentsFixture.h"
 
 #include <gmock/gmock.h>

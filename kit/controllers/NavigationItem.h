@@ -1,0 +1,64 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
+#pragma once
+
+#include "kit/controllers/BarButtonItem.h"
+#include "kit/values/Menu.h"
+
+#include <functional>
+
+namespace platform::ui {
+
+/// What a screen shows in the navigation bar while it is on top.
+class NavigationItem {
+public:
+    /// `onChange` is called after every change.
+    explicit NavigationItem(std::function<void()> onChange);
+
+    const std::string& title() const { return _title; }
+    void setTitle(std::string title);
+    const std::string& subtitle() const { return _subtitle; } ///< empty: none
+    void setSubtitle(std::string subtitle);
+
+    const BarButtonItems& leftItems() const { return _leftItems; }
+    void setLeftItems(BarButtonItems items);
+    /// The first one stands at the right edge, the others go on to the left.
+    const BarButtonItems& rightItems() const { return _rightItems; }
+    void setRightItems(BarButtonItems items);
+    void setRightItem(std::shared_ptr<BarButtonItem> item); ///< null: none
+
+    bool hidesBackButton() const { return _hidesBackButton; }
+    void setHidesBackButton(bool hides);
+    /// Whether left items stand beside the back button instead of replacing it.
+    bool leftItemsSupplementBackButton() const { return _leftItemsSupplementBackButton; }
+    void setLeftItemsSupplementBackButton(bool supplement);
+
+    /// What the bar's search button does; absent: no such button.
+    const std::function<void()>& searchAction() const { return _searchAction; }
+    void setSearchAction(std::function<void()> action);
+
+    /// What the key for something new does (Ctrl+Shift+N); absent: nothing.
+    const std::function<void()>& newAction() const { return _newAction; }
+    void setNewAction(std::function<void()> action);
+
+    /// The menu of the bar's menu button, asked for when it is pressed; absent: no such button.
+    using MenuMaker = std::function<Menu()>;
+    const MenuMaker& menu() const { return _menu; }
+    const std::string& menuName() const { return _menuName; }
+    void setMenu(std::string name, MenuMaker menu);
+
+private:
+    template <typename T>
+    void set(T& field, T value);
+
+    std::function<void()> _onChange;
+    std::string _title, _subtitle;
+    BarButtonItems _leftItems, _rightItems;
+    bool _hidesBackButton = false, _leftItemsSupplementBackButton = false;
+    std::function<void()> _searchAction, _newAction;
+    std::string _menuName;
+    MenuMaker _menu;
+};
+
+} // namespace platform::ui

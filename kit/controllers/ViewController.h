@@ -1,0 +1,143 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
+#pragma once
+
+#include "kit/controllers/BarButtonItem.h"
+#include "kit/controllers/PopoverAnchor.h"
+#include "kit/controllers/Presentation.h"
+#include "kit/controllers/ViewControllerObserver.h"
+#include "kit/values/ObserverSlot.h"
+#include "kit/values/TraitCollection.h"
+#include "kit/views/ViewOwner.h"
+#include "platform/Geometry.h"
+#include "platform/StateCoder.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace platform::ui {
+
+class NavigationController;
+class NavigationItem;
+class TransitionCoordinator;
+class View;
+class ViewControllerVisitor;
+class Window;
+
+enum class AppearanceState { Disappeared, Appearing, Appeared, Disappearing };
+
+/// One screen: a view that is made on first demand, what surrounds it, and the screens that it contains or
+/// presents. Made with std::make_shared. Main thread only.
+class ViewController : public ViewOwner, public std::enable_shared_from_this<ViewController> {
+public:
+    ViewController();
+    ~ViewController() override;
+    ViewController(const ViewController&) = delete;
+    ViewController& operator=(const ViewController&) = delete;
+
+    virtual void accept(ViewControllerVisitor& visitor);
+    void setObserver(std::weak_ptr<ViewControllerObserver> observer) { _observer.set(std::move(observer)); }
+
+    /// Loads the view when it is not loaded yet.
+    const std::shared_ptr<View>& view();
+    const std::shared_ptr<View>& viewIfLoaded() const { return _view; }
+    bool isViewLoaded() const { return _view != nullptr; }
+    void setView(std::shared_ptr<View> view);
+    virtual void loadView(); ///< the default makes an empty view
+    virtual void viewDidLoad() { }
+
+    // Called once for each appearance, in this order; an appearance may be broken off.
+    virtual void viewWillAppear(bool /*animated*/) { }
+    virtual void viewDidAppear(bool /*animated*/) { }
+    virtual void viewWillDisappear(bool /*animated*/) { }
+    virtual void viewDidDisappear(bool /*animated*/) { }
+    /// The view is about to get this size. Overriders call the base class, which tells the contained screens.
+    virtual void viewWillTransitionToSizeWithTransitionCoordinator(
+        Size size, TransitionCoordinator& coordinator);
+    virtual void traitsDidChange(const TraitCollection& /*previous*/) { }
+
+    AppearanceState appearanceState() const { return _appearance; }
+    bool isVisible() const; ///< loaded, and in a window
+    std::shared_ptr<Window> window() const;
+    const TraitCollection& traits() const;
+
+    const std::string& title() const { return _title; }
+    void setTitle(std::string title); ///< the navigation item's title as well
+    NavigationItem& navigationItem() { return *_navigationItem; }
+    const BarButtonItems& toolbarItems() const { return _toolbarItems; }
+    void setToolbarItems(BarButtonItems items);
+
+    // Containment: add the child, then its view, then tell the child.
+    std::shared_ptr<ViewController> parent() const { return _parent.lock(); }
+    const std::vector<std::shared_ptr<ViewController>>& children() const { return _children; }
+    void addChildViewController(const std::shared_ptr<ViewController>& child);
+    void removeFromParentViewController();
+    virtual void didMoveToParentViewController(const std::shared_ptr<ViewController>& /*parent*/) { }
+    std::shared_ptr<NavigationController>
+    navigationController() const; ///< the nearest one around this screen
+
+    /// Shows a screen over this one, or over what already lies over it. The completion runs when the screen
+    /// is in place.
+    void presentViewController(const std::shared_ptr<ViewController>& presented, bool animated,
+        std::function<void()> completion = {});
+    /// Takes away everything that this screen presents; without such, itself when it is presented. The
+    /// completion runs once at the end, also when there was nothing to dismiss.
+    void dismissViewController(bool animated, std::function<void()> completion = {});
+    /// The screen presented by this one or by a screen that contains it; null: none.
+    std::shared_ptr<ViewController> presentedViewController() const;
+    std::shared_ptr<ViewController> presentingViewController() const;
+    PresentationStyle presentationStyle() const { return _presentationStyle; }
+    void setPresentationStyle(PresentationStyle style) { _presentationStyle = style; }
+    const PopoverAnchor& popoverAnchor() const { return _popoverAnchor; }
+    void setPopoverAnchor(PopoverAnchor anchor) { _popoverAnchor = std::move(anchor); }
+    /// Event up: the user asks to leave this presented screen (Escape, a tap beside it). The default
+    /// dismisses it.
+    virtual void userCancelled();
+    /// Event up: the user asks to go back within this screen. The default presses the Cancel button of the
+    /// navigation bar. False: there is nothing to go back to.
+    virtual bool backRequested();
+
+    const std::string& restorationIdentifier() const
+    {
+        return _restorationIdentifier;
+    } ///< empty: not restored
+    void setRestorationIdentifier(std::string identifier) { _restorationIdentifier = std::move(identifier); }
+    virtual void encodeRestorableStateWithCoder(StateCoder&) { }
+    virtual void decodeRestorableStateWithCoder(const StateCoder&) { }
+
+    // For containers and windows: an appearance begins, and ends.
+    void beginAppearance(bool appearing, bool animated);
+    void endAppearance();
+    /// The contained screens that appear along with this one.
+    virtual std::vector<std::shared_ptr<ViewController>> appearingChildren() const { return _children; }
+
+protected:
+    void barsChanged();
+
+private:
+    friend class NavigationController;
+    friend class Window;
+
+    virtual std::shared_ptr<NavigationController> asNavigationController() { return nullptr; }
+    std::shared_ptr<ViewController> presentationRoot() const;
+    void finishTransition() const;
+    void tellTraits(const TraitCollection& previous);
+
+    std::shared_ptr<View> _view;
+    std::string _title, _restorationIdentifier;
+    std::unique_ptr<NavigationItem> _navigationItem;
+    BarButtonItems _toolbarItems;
+    std::weak_ptr<ViewController> _parent, _presenting;
+    std::vector<std::shared_ptr<ViewController>> _children;
+    std::shared_ptr<ViewController> _presented;
+    PresentationStyle _presentationStyle = PresentationStyle::FullScreen;
+    PopoverAnchor _popoverAnchor;
+    AppearanceState _appearance = AppearanceState::Disappeared;
+    bool _animatedAppearance = false, _isLoading = false;
+    ObserverSlot<ViewControllerObserver> _observer;
+};
+
+} // namespace platform::ui

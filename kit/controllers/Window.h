@@ -1,0 +1,82 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
+#pragma once
+
+#include "kit/controllers/Presentation.h"
+#include "kit/controllers/WindowObserver.h"
+#include "kit/values/ObserverSlot.h"
+#include "kit/values/Screen.h"
+#include "kit/values/TraitCollection.h"
+#include "platform/Color.h"
+#include "platform/Geometry.h"
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <vector>
+
+namespace platform::ui {
+
+class ViewController;
+
+/// The window of the application: a root screen and the screens presented over it. Made with
+/// std::make_shared.
+class Window : public std::enable_shared_from_this<Window> {
+public:
+    explicit Window(const Rect& bounds = {});
+    ~Window();
+
+    void setObserver(std::weak_ptr<WindowObserver> observer) { _observer.set(std::move(observer)); }
+
+    const Rect& bounds() const { return _bounds; }
+    const TraitCollection& traits() const { return _traits; }
+    const std::optional<Color>& background() const { return _background; }
+    void setBackground(std::optional<Color> color);
+    InterfaceOrientation interfaceOrientation() const; ///< upright unless the window is wider than high
+
+    const std::shared_ptr<ViewController>& rootViewController() const { return _root; }
+    void setRootViewController(std::shared_ptr<ViewController> root);
+    /// Shows the window through the installed host, if any; the root screen appears.
+    void makeKeyAndVisible();
+    bool isVisible() const { return _visible; }
+    bool isKey() const { return _key; }
+
+    /// The screens over the root, the topmost last.
+    std::vector<std::shared_ptr<ViewController>> presentedScreens() const;
+    void layoutIfNeeded();
+
+    // Events up.
+    void resized(Size size, const TraitCollection& traits);
+    void becameKey(bool key) { _key = key; }
+    /// The user asks to go back (Escape, Alt+Left, the back gesture): the topmost presented screen is
+    /// cancelled, else the Cancel button of the bar is pressed, else the navigation goes back. False: nothing
+    /// to go back to.
+    bool backRequested();
+    /// The window was closed: its screens disappear.
+    void closed();
+
+    // For view controllers.
+    void finishTransition() { _transition.finish(); }
+    void present(const Presentation& presentation, std::function<void()> completion);
+    /// The screens have been taken off the model, the topmost comes last; the first one was presented by
+    /// `presenting`.
+    void dismiss(std::vector<Presentation> presentations, std::function<void()> completion);
+
+private:
+    using Screens = std::vector<std::shared_ptr<ViewController>>;
+
+    void attach(ViewController& screen);
+    void dismissOne(const Presentation& presentation, std::function<void()> completion);
+    void show(const Presentation& presentation, std::function<void()> completion);
+
+    Rect _bounds;
+    TraitCollection _traits;
+    std::optional<Color> _background;
+    std::shared_ptr<ViewController> _root;
+    ObserverSlot<WindowObserver> _observer;
+    TransitionToken _transition;
+    bool _visible = false, _key = false;
+};
+
+} // namespace platform::ui

@@ -1,0 +1,37 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
+#pragma once
+
+#include "kit/values/ListChanges.h"
+
+#include <optional>
+#include <string_view>
+
+namespace platform::ui {
+
+class ListView;
+
+/// Answers what a list shows. Asked on the main thread, only for rows that are about to be seen, so an answer
+/// must come from memory: what takes longer is fetched after `visibleRowsDidChange` and told with
+/// `rowChanged`.
+class ListViewDataSource {
+public:
+    virtual ~ListViewDataSource() = default;
+
+    virtual std::size_t numberOfRows(const ListView& list) const = 0;
+    /// `index` is below the number of rows.
+    virtual ListRow rowAtIndex(const ListView& list, std::size_t index) const = 0;
+    /// The same identifier and kind that `rowAtIndex` answers, without making the row.
+    virtual RowId rowIdAtIndex(const ListView& list, std::size_t index) const = 0;
+    virtual RowKind rowKindAtIndex(const ListView&, std::size_t /*index*/) const { return RowKind::Item; }
+    /// For typing ahead: the first row at or after `from`, and then from the top, whose name begins with a
+    /// text, whatever its case and accents; nothing when none does.
+    virtual std::optional<std::size_t> rowBeginningWith(
+        const ListView&, std::string_view /*text*/, std::size_t /*from*/) const
+    {
+        return std::nullopt;
+    }
+};
+
+} // namespace platform::ui

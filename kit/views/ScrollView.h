@@ -1,0 +1,73 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
+#pragma once
+
+#include "kit/views/View.h"
+
+#include <functional>
+
+namespace platform::ui {
+
+class ScrollView;
+
+enum class Bounce { Never, WhenLarger, Always };
+
+/// What a scroll view lets the user see and do.
+struct ScrollBehavior {
+    bool showsHorizontalIndicator = true, showsVerticalIndicator = true;
+    Bounce horizontalBounce = Bounce::WhenLarger, verticalBounce = Bounce::WhenLarger;
+    bool operator==(const ScrollBehavior&) const = default;
+};
+
+/// Calls down that only a scroll view makes, beside those of ViewObserver.
+class ScrollObserver {
+public:
+    virtual ~ScrollObserver() = default;
+    /// The program scrolls; the offset of the model has changed already.
+    virtual void scrollTo(ScrollView& view, Point offset, bool animated) = 0;
+    /// Content size, insets or behaviour.
+    virtual void scrollExtentDidChange(ScrollView& view) = 0;
+};
+
+/// A window on content that is larger than the view. The content is placed by frames, from (0, 0) to the
+/// content size; the offset is the origin of the bounds.
+class ScrollView : public View {
+public:
+    using View::View;
+
+    void accept(ViewVisitor& visitor) override;
+    void setScrollObserver(std::weak_ptr<ScrollObserver> observer)
+    {
+        _scrollObserver.set(std::move(observer));
+    }
+
+    Size contentSize() const { return _contentSize; }
+    void setContentSize(Size size);
+    const EdgeInsets& contentInsets() const { return _contentInsets; }
+    void setContentInsets(const EdgeInsets& insets);
+    const ScrollBehavior& scrollBehavior() const { return _behavior; }
+    void setScrollBehavior(const ScrollBehavior& behavior);
+
+    Point contentOffset() const { return bounds().origin(); }
+    void setContentOffset(Point offset, bool animated = false);
+    /// The smallest scrolling that brings a rectangle of the content into view.
+    void scrollRectToVisible(const Rect& rect, bool animated);
+    /// Called after every change of the offset, by whomever.
+    void setOnScroll(std::function<void()> callback) { _onScroll = std::move(callback); }
+
+    /// Event up: the user scrolled there.
+    void userScrolled(Point offset);
+
+protected:
+    virtual void contentOffsetDidChange();
+
+private:
+    Size _contentSize;
+    EdgeInsets _contentInsets;
+    ScrollBehavior _behavior;
+    ObserverSlot<ScrollObserver> _scrollObserver;
+    std::function<void()> _onScroll;
+};
+
+} // namespace platform::ui

@@ -1,0 +1,83 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
+#pragma once
+
+#include "kit/views/Label.h"
+#include "kit/views/TextFieldDelegate.h"
+
+#include <functional>
+
+namespace platform::ui {
+
+enum class ReturnKey { Default, Done, Search };
+enum class Capitalization { None, Words, Sentences };
+enum class Autocorrection { Default, Off };
+enum class ClearButton { Never, WhileEditing };
+
+/// What the on-screen keyboard and the field's own controls look like.
+struct TextInputTraits {
+    ReturnKey returnKey = ReturnKey::Default;
+    bool returnKeyNeedsText = false; ///< the return key works only while the field holds text
+    Capitalization capitalization = Capitalization::Sentences;
+    Autocorrection autocorrection = Autocorrection::Default;
+    ClearButton clearButton = ClearButton::Never;
+    bool operator==(const TextInputTraits&) const = default;
+};
+
+/// One line of text that the user edits.
+class TextField : public View {
+public:
+    explicit TextField(std::string text = {});
+
+    void accept(ViewVisitor& visitor) override;
+
+    const std::string& text() const { return _text; }
+    void setText(std::string text); ///< by the program: no event, the insertion point goes to the end
+    const std::string& placeholder() const { return _placeholder; }
+    void setPlaceholder(std::string placeholder);
+    const Font& font() const { return _font; }
+    void setFont(const Font& font);
+    TextAlignment alignment() const { return _alignment; }
+    void setAlignment(TextAlignment alignment);
+    const TextInputTraits& inputTraits() const { return _inputTraits; }
+    void setInputTraits(const TextInputTraits& traits);
+    TextRange selectedRange() const { return _selection; }
+    void setSelectedRange(TextRange range); ///< cut to the length of the text
+    std::size_t length() const; ///< in characters
+
+    void setDelegate(std::weak_ptr<TextFieldDelegate> delegate) { _delegate = std::move(delegate); }
+    /// Called after every edit by the user.
+    void setOnEditingChanged(std::function<void()> callback) { _onEditingChanged = std::move(callback); }
+
+    bool isEditing() const { return _editing; }
+    bool becomeFirstResponder() override; ///< begins editing when the delegate allows it
+    bool resignFirstResponder() override; ///< ends editing when the delegate allows it
+
+    // Events up.
+    /// The field now shows this text with this selection. False: the edit was refused, and the observer is
+    /// told to show the old text again.
+    bool userEdited(const std::string& text, TextRange selection);
+    void userSelected(TextRange selection);
+    bool userPressedReturn(); ///< false when the key has no effect, or the delegate refuses
+    bool userFocused() { return becomeFirstResponder(); }
+    /// The focus moved elsewhere. False: the end was refused, and the observer is asked to take the focus
+    /// back.
+    bool userLeft() { return resignFirstResponder(); }
+
+    Size intrinsicContentSize(double maxWidth = 0) const override;
+    double firstBaselineOffset() const override;
+    double lastBaselineOffset() const override;
+
+private:
+    std::string _text, _placeholder;
+    Font _font = Font::preferred(TextStyle::Body);
+    TextAlignment _alignment = TextAlignment::Natural;
+    TextInputTraits _inputTraits;
+    TextRange _selection;
+    std::weak_ptr<TextFieldDelegate> _delegate;
+    std::function<void()> _onEditingChanged;
+    bool _editing = false;
+};
+
+} // namespace platform::ui

@@ -1,0 +1,15 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
+#include "kit/views/ViewObserver.h"
+
+namespace platform::ui {
+
+void ViewObserver::viewWantsFocus(View&, bool) { }
+
+std::optional<Size> ViewObserver::nativeSize(const View&, double)
+{
+    return std::nullopt;
+}
+
+} // namespace platform::ui

@@ -1,0 +1,439 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
+#include "kit/controllers/AlertController.h"
+#include "kit/controllers/InterfaceState.h"
+#include "kit/controllers/NavigationController.h"
+#include "kit/controllers/NavigationItem.h"
+#include "kit/controllers/SearchPresentation.h"
+#include "kit/controllers/Window.h"
+#include "kit/values/TransitionCoordinator.h"
+#include "kit/views/TextField.h"
+#include "kit/views/View.h"
+
+#include <gtest/gtest.h>
+
+namespace platform::ui {
+
+namespace {
+
+using Events = std::vector<std::string>;
+
+/// Writes down what happens to it.
+class Screen : public ViewController {
+public:
+    Screen(std::string name, Events& events)
+        : _name(std::move(name))
+        , _events(events)
+    {
+        setTitle(_name);
+    }
+    void viewDidLoad() override { note("load"); }
+    void viewWillAppear(bool) override { note("will appear"); }
+    void viewDidAppear(bool) override { note("did appear"); }
+    void viewWillDisappear(bool) override { note(navigationController() ? "will go" : "will go, orphaned"); }
+    void viewDidDisappear(bool) override { note("did go"); }
+    void didMoveToParentViewController(const std::shared_ptr<ViewController>& parent) override
+    {
+        if (!parent)
+            note("left");
+    }
+    void viewWillLayoutSubviews() override { note("layout"); }
+
+private:
+    void note(const std::string& what) { _events.push_back(_name + " " + what); }
+
+    std::string _name;
+    Events& _events;
+};
+
+class ShownScreens : public NavigationControllerDelegate {
+public:
+    explicit ShownScreens(Events& events)
+        : _events(events)
+    {
+    }
+    void navigationControllerWillShowViewControllerAnimated(
+        NavigationController&, const std::shared_ptr<ViewController>& screen, bool) override
+    {
+        _events.push_back("will show " + screen->title());
+    }
+    void navigationControllerDidShowViewControllerAnimated(
+        NavigationController&, const std::shared_ptr<ViewController>& screen, bool) override
+    {
+        _events.push_back("did show " + screen->title());
+    }
+
+private:
+    Events& _events;
+};
+
+/// A host whose movements last until the test ends them.
+class SlowHost : public NavigationObserver, public WindowObserver {
+public:
+    void navigationWillTransition(
+        NavigationController&, const NavigationTransition& transition, TransitionToken token) override
+    {
+        kinds.push_back(transition.kind);
+        tokens.push_back(std::move(token));
+    }
+    void stackDidChange(NavigationController&) override { ++stackChanges; }
+    void toolbarVisibilityDidChange(NavigationController&, bool) override { }
+    void rootDidChange(Window&) override { }
+    void windowWillPresent(Window&, const Presentation&, TransitionToken token) override
+    {
+        tokens.push_back(std::move(token));
+    }
+    void windowWillDismiss(Window&, const Presentation&, TransitionToken token) override
+    {
+        tokens.push_back(std::move(token));
+    }
+
+    std::vector<NavigationKind> kinds;
+    std::vector<TransitionToken> tokens;
+    int stackChanges = 0;
+};
+
+class Screens : public testing::Test {
+protected:
+    std::shared_ptr<Screen> screen(const std::string& name) { return std::make_shared<Screen>(name, events); }
+
+    void show()
+    {
+        navigation->setDelegate(delegate);
+        window->setRootViewController(navigation);
+        window->makeKeyAndVisible();
+    }
+    Events take() { return std::exchange(events, {}); }
+
+    Events events;
+    std::shared_ptr<ShownScreens> delegate = std::make_shared<ShownScreens>(events);
+    std::shared_ptr<NavigationController> navigation = std::make_shared<NavigationController>();
+    std::shared_ptr<Window> window = std::make_shared<Window>(Rect{0, 0, 360, 640});
+};
+
+} // namespace
+
+TEST_F(Screens, AppearInOrderWhileTheStackChanges)
+{
+    const auto a = screen("a"), b = screen("b"), c = screen("c");
+    navigation->setViewControllers({a}, false);
+    EXPECT_TRUE(take().empty());
+    show();
+    EXPECT_EQ(take(), (Events{"a load", "a will appear", "will show a", "a did appear", "did show a"}));
+
+    navigation->pushViewController(b, true);
+    EXPECT_EQ(take(),
+        (Events{"a will go", "b load", "b will appear", "will show b", "a did go", "b did appear",
+            "did show b"}));
+    EXPECT_TRUE(b->isVisible());
+    EXPECT_FALSE(a->isVisible());
+
+    navigation->setViewControllers({a, c, b}, true);
+    EXPECT_TRUE(take().empty());
+
+    EXPECT_EQ(navigation->popToRootViewController(true).size(), 2);
+    EXPECT_EQ(take(),
+        (Events{"c left", "b will go", "a will appear", "will show a", "b did go", "b left", "a did appear",
+            "did show a"}));
+    EXPECT_EQ(navigation->popViewController(true), nullptr);
+    EXPECT_EQ(b->navigationController(), nullptr);
+
+    window->closed();
+    EXPECT_EQ(take(), (Events{"a will go", "a did go"}));
+}
+
+TEST_F(Screens, WaitForTheMovementOfAHost)
+{
+    const auto a = screen("a"), b = screen("b"), c = screen("c");
+    const auto host = std::make_shared<SlowHost>();
+    navigation->setNavigationObserver(host);
+    navigation->setViewControllers({a}, false);
+    EXPECT_EQ(host->stackChanges, 1);
+    show();
+    take();
+    navigation->pushViewController(b, true);
+    EXPECT_EQ(take(), (Events{"a will go", "b load", "b will appear", "will show b"}));
+    EXPECT_EQ(navigation->topViewController(), b);
+    EXPECT_TRUE(navigation->isTransitioning());
+
+    // The next change ends the first one before anything else.
+    navigation->setViewControllers({c}, true);
+    EXPECT_EQ(take(),
+        (Events{"a did go", "b did appear", "did show b", "a left", "b will go", "c load", "c will appear",
+            "will show c"}));
+    host->tokens.front().finish();
+    EXPECT_TRUE(take().empty());
+
+    // A host that goes away loses nothing.
+    host->tokens.clear();
+    navigation->setNavigationObserver({});
+    navigation->pushViewController(a, true);
+    const auto after = take();
+    EXPECT_EQ(after.front(), "b did go");
+    EXPECT_EQ(after.back(), "did show a");
+    EXPECT_EQ(host->kinds, (std::vector{NavigationKind::Push, NavigationKind::Replace}));
+}
+
+namespace {
+
+/// Sets up its stack while its view loads.
+class SelfMade : public NavigationController {
+public:
+    explicit SelfMade(std::shared_ptr<ViewController> first)
+        : _first(std::move(first))
+    {
+    }
+    void viewDidLoad() override
+    {
+        setViewControllers({_first}, false);
+        NavigationController::viewDidLoad();
+    }
+
+private:
+    std::shared_ptr<ViewController> _first;
+};
+
+} // namespace
+
+TEST_F(Screens, OfAStackMadeWhileLoadingAppearOnce)
+{
+    navigation = std::make_shared<SelfMade>(screen("a"));
+    show();
+    window->layoutIfNeeded();
+    EXPECT_EQ(
+        take(), (Events{"a load", "a will appear", "will show a", "a did appear", "did show a", "a layout"}));
+    EXPECT_EQ(navigation->topViewController()->view()->frame(), (Rect{0, 0, 360, 640}));
+}
+
+TEST_F(Screens, GoBackWhereTheBarAllowsIt)
+{
+    const auto a = screen("a"), b = screen("b");
+    navigation->setViewControllers({a, b}, false);
+    show();
+    b->navigationItem().setHidesBackButton(true);
+    EXPECT_FALSE(window->backRequested());
+    bool cancelled = false;
+    b->navigationItem().setRightItem(
+        std::make_shared<BarButtonItem>(SystemItem::Cancel, [&](const auto&) { cancelled = true; }));
+    EXPECT_TRUE(window->backRequested());
+    EXPECT_TRUE(cancelled);
+    b->navigationItem().setRightItems({});
+    b->navigationItem().setHidesBackButton(false);
+    EXPECT_TRUE(window->backRequested());
+    EXPECT_EQ(navigation->topViewController(), a);
+    EXPECT_FALSE(window->backRequested());
+}
+
+TEST_F(Screens, LieOverEachOtherAndGoTogether)
+{
+    const auto list = screen("list");
+    navigation->setViewControllers({list}, false);
+    show();
+    take();
+    const auto search = std::make_shared<SearchPresentation>();
+    const auto sheet = screen("sheet"), full = screen("full");
+    sheet->setPresentationStyle(PresentationStyle::OverCurrentContext);
+    list->presentViewController(search, true);
+    EXPECT_EQ(navigation->presentedViewController(), search);
+    navigation->presentViewController(sheet, true);
+    EXPECT_EQ(sheet->presentingViewController(), search);
+    EXPECT_EQ(navigation->visibleViewController(), sheet);
+    EXPECT_EQ(take(), (Events{"sheet load", "sheet will appear", "sheet did appear"}));
+    sheet->presentViewController(full, false);
+    EXPECT_EQ(take(),
+        (Events{
+            "full load", "sheet will go, orphaned", "full will appear", "sheet did go", "full did appear"}));
+    bool done = false;
+    navigation->dismissViewController(true, [&] { done = true; });
+    EXPECT_TRUE(done);
+    EXPECT_EQ(window->presentedScreens().size(), 0);
+    const auto left = take();
+    EXPECT_EQ(std::count(left.begin(), left.end(), "full did go"), 1);
+    EXPECT_EQ(left.back(), "sheet did go");
+    EXPECT_FALSE(full->isVisible());
+
+    done = false;
+    navigation->dismissViewController(true, [&] { done = true; });
+    EXPECT_TRUE(done);
+}
+
+TEST_F(Screens, OnlyAFullScreenHidesTheOneBelow)
+{
+    navigation->setViewControllers({screen("list")}, false);
+    show();
+    const auto full = screen("full");
+    take();
+    navigation->presentViewController(full, true);
+    EXPECT_EQ(
+        take(), (Events{"full load", "list will go", "full will appear", "list did go", "full did appear"}));
+    window->backRequested();
+    EXPECT_EQ(
+        take(), (Events{"full will go, orphaned", "list will appear", "full did go", "list did appear"}));
+}
+
+namespace {
+
+struct Question {
+    std::shared_ptr<AlertController> alert;
+    std::shared_ptr<AlertAction> accept;
+    Events answers;
+};
+
+std::shared_ptr<Question> ask(AlertActionStyle cancelStyle)
+{
+    const auto question = std::make_shared<Question>();
+    const auto note = [question = question.get()](const std::shared_ptr<AlertAction>& action) {
+        question->answers.push_back(action->title());
+    };
+    question->alert = std::make_shared<AlertController>("Title", "Message", AlertStyle::Alert);
+    question->accept = std::make_shared<AlertAction>("Create", AlertActionStyle::Default, note);
+    question->alert->addAction(std::make_shared<AlertAction>("Cancel", cancelStyle, note));
+    question->alert->addAction(question->accept);
+    return question;
+}
+
+} // namespace
+
+TEST_F(Screens, AnAlertStaysUntilItMayClose)
+{
+    navigation->setViewControllers({screen("list")}, false);
+    show();
+    const auto question = ask(AlertActionStyle::Default);
+    bool mayClose = false;
+    question->accept->setShouldClose([&] { return mayClose; });
+    question->accept->setEnabled(false);
+    TextField* field = nullptr;
+    question->alert->addTextField([&](TextField& made) { field = &made; });
+    navigation->presentViewController(question->alert, true);
+    EXPECT_TRUE(field->isEditing());
+    EXPECT_FALSE(question->alert->press(1));
+    question->accept->setEnabled(true);
+    EXPECT_FALSE(question->alert->press(1));
+    // Neither a cancel style nor an escape action: Escape does nothing.
+    EXPECT_TRUE(window->backRequested());
+    EXPECT_EQ(navigation->presentedViewController(), question->alert);
+    mayClose = true;
+    EXPECT_TRUE(question->alert->press(1));
+    EXPECT_EQ(question->answers, Events{"Create"});
+    EXPECT_EQ(navigation->presentedViewController(), nullptr);
+    EXPECT_FALSE(field->isEditing());
+    EXPECT_FALSE(question->alert->press(7));
+}
+
+TEST_F(Screens, AnAlertAnswersOnceAfterItHasGone)
+{
+    const auto host = std::make_shared<SlowHost>();
+    navigation->setViewControllers({screen("list")}, false);
+    show();
+    window->setObserver(host);
+    const auto question = ask(AlertActionStyle::Cancel);
+    navigation->presentViewController(question->alert, true);
+    host->tokens.back().finish();
+    question->alert->userCancelled();
+    EXPECT_FALSE(question->alert->press(1));
+    EXPECT_TRUE(question->answers.empty());
+
+    // The next alert waits for no one: what the first one left comes before it.
+    const auto next = ask(AlertActionStyle::Cancel);
+    navigation->presentViewController(next->alert, true);
+    EXPECT_EQ(question->answers, Events{"Cancel"});
+    EXPECT_EQ(navigation->presentedViewController(), next->alert);
+    host->tokens[1].finish();
+    EXPECT_EQ(question->answers.size(), 1);
+}
+
+TEST_F(Screens, AChainOfAlertsFromHandlersIsShown)
+{
+    navigation->setViewControllers({screen("list")}, false);
+    show();
+    const auto second = ask(AlertActionStyle::Cancel);
+    const auto first = std::make_shared<AlertController>("First", "", AlertStyle::ActionSheet);
+    first->addAction(std::make_shared<AlertAction>("Next", AlertActionStyle::Destructive,
+        [&](const auto&) { navigation->presentViewController(second->alert, true); }));
+    navigation->presentViewController(first, true);
+    EXPECT_TRUE(first->press(0));
+    EXPECT_EQ(navigation->presentedViewController(), second->alert);
+    EXPECT_EQ(second->alert->presentingViewController(), navigation);
+    EXPECT_EQ(window->presentedScreens().size(), 1);
+}
+
+namespace {
+
+class Turning : public ViewController {
+public:
+    void viewWillTransitionToSizeWithTransitionCoordinator(
+        Size size, TransitionCoordinator& coordinator) override
+    {
+        ViewController::viewWillTransitionToSizeWithTransitionCoordinator(size, coordinator);
+        wide = size.width > size.height;
+        widthBefore = view()->frame().width;
+        coordinator.animateAlongside([this] { ++alongside; });
+    }
+    void traitsDidChange(const TraitCollection& previous) override { before = previous; }
+
+    bool wide = false;
+    double widthBefore = 0;
+    int alongside = 0;
+    std::optional<TraitCollection> before;
+};
+
+} // namespace
+
+TEST_F(Screens, HearOfANewSizeBeforeItHolds)
+{
+    const auto turning = std::make_shared<Turning>();
+    navigation->setViewControllers({turning}, false);
+    show();
+    window->layoutIfNeeded();
+    TraitCollection wide;
+    wide.horizontalSizeClass = SizeClass::Regular;
+    window->resized({640, 360}, wide);
+    window->layoutIfNeeded();
+    EXPECT_TRUE(turning->wide);
+    EXPECT_EQ(turning->widthBefore, 360);
+    EXPECT_EQ(turning->alongside, 1);
+    EXPECT_EQ(turning->view()->frame().width, 640);
+    EXPECT_EQ(turning->traits(), wide);
+    EXPECT_EQ(turning->before, TraitCollection());
+    EXPECT_EQ(window->interfaceOrientation(), InterfaceOrientation::LandscapeLeft);
+    window->resized({640, 360}, wide);
+    EXPECT_EQ(turning->alongside, 1);
+}
+
+namespace {
+
+class Remembering : public ViewController {
+public:
+    explicit Remembering(std::string identifier) { setRestorationIdentifier(std::move(identifier)); }
+    void encodeRestorableStateWithCoder(StateCoder& coder) override { coder.encode("value", value); }
+    void decodeRestorableStateWithCoder(const StateCoder& coder) override
+    {
+        if (const auto* kept = coder.decode("value"))
+            value = static_cast<int>(kept->asInteger().value_or(-1));
+        addChildViewController(std::make_shared<ViewController>());
+    }
+    int value = 0;
+};
+
+} // namespace
+
+TEST_F(Screens, KeepTheirStateByIdentifier)
+{
+    const auto root = std::make_shared<Remembering>("Root"), child = std::make_shared<Remembering>("Child"),
+               nameless = std::make_shared<Remembering>("");
+    root->addChildViewController(nameless);
+    nameless->addChildViewController(child);
+    root->value = 1;
+    child->value = 2;
+    nameless->value = 3;
+    const auto state = encodeInterfaceState(*root);
+    EXPECT_EQ(state.size(), 2);
+    root->value = child->value = nameless->value = 0;
+    decodeInterfaceState(*root, state);
+    EXPECT_EQ(root->value, 1);
+    EXPECT_EQ(child->value, 2);
+    EXPECT_EQ(nameless->value, 0);
+}
+
+} // namespace platform::ui
