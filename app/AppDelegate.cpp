@@ -22,7 +22,7 @@ namespace tarrow {
 using platform::Application;
 using platform::ShortcutItem;
 using platform::UserActivity;
-using platform::ui::Window;
+using kit::Window;
 
 namespace {
 
@@ -98,7 +98,7 @@ bool AppDelegate::applicationWillFinishLaunchingWithOptions(
     Application& application, const platform::LaunchOptions& options)
 {
     static constexpr Operation op{"-[AppDelegate application:willFinishLaunchingWithOptions:]"};
-    const auto& screen = platform::ui::Screen::main();
+    const auto& screen = kit::Screen::main();
     _rootWindow = std::make_shared<Window>(screen ? screen->bounds : platform::Rect{});
     _rootWindow->setBackground(platform::Color::white());
     const auto root = std::make_shared<NavController>();

@@ -9,7 +9,7 @@
 #include <optional>
 #include <string>
 
-namespace platform::ui {
+namespace kit {
 class Window;
 }
 
@@ -22,8 +22,8 @@ class NavController;
 class AppDelegate : public platform::ApplicationDelegate, public std::enable_shared_from_this<AppDelegate> {
 public:
     /// Null before the launch.
-    const std::shared_ptr<platform::ui::Window>& rootWindow() const { return _rootWindow; }
-    void setRootWindow(std::shared_ptr<platform::ui::Window> window) { _rootWindow = std::move(window); }
+    const std::shared_ptr<kit::Window>& rootWindow() const { return _rootWindow; }
+    void setRootWindow(std::shared_ptr<kit::Window> window) { _rootWindow = std::move(window); }
 
     bool applicationWillFinishLaunchingWithOptions(
         platform::Application& application, const platform::LaunchOptions& options) override;
@@ -61,7 +61,7 @@ private:
     void openSearchResult(const platform::UserActivity& activity);
     void openHandedOverDocument(const platform::UserActivity& activity);
 
-    std::shared_ptr<platform::ui::Window> _rootWindow;
+    std::shared_ptr<kit::Window> _rootWindow;
 };
 
 /// Logs one line at each level. For diagnosis; nothing calls it.

@@ -13,7 +13,7 @@
 namespace {
 
 using namespace platform;
-using namespace platform::ui;
+using namespace kit;
 
 /// A screen of 100 constrained views: fifty rows of a name and a value, the names sharing one width.
 class Form {

@@ -30,9 +30,9 @@
 namespace {
 
 using namespace bench;
-using platform::components::FolderContents;
-using platform::components::ListOrder;
-using platform::components::OrderKey;
+using screens::FolderContents;
+using screens::ListOrder;
+using screens::OrderKey;
 
 constexpr int changesTimed = 40;
 constexpr int arrivals = 10'000;
@@ -97,7 +97,7 @@ public:
     {
         _dispatch = installedDispatch();
         _contents = FolderContents::create(
-            platform::Url::fileURL(path), [this](const platform::components::FolderContentsUpdate& update) {
+            platform::Url::fileURL(path), [this](const screens::FolderContentsUpdate& update) {
                 ++_updates;
                 _isComplete = update.stage == platform::ListingStage::Complete;
             });
@@ -200,7 +200,7 @@ BENCHMARK(showChangeByName)
 
 void showChangeByDate(benchmark::State& state)
 {
-    showChange(state, {OrderKey::Date, platform::components::OrderDirection::Descending});
+    showChange(state, {OrderKey::Date, screens::OrderDirection::Descending});
 }
 BENCHMARK(showChangeByDate)->Arg(100'000)->Iterations(1)->Unit(benchmark::kMillisecond);
 

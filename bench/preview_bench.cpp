@@ -184,9 +184,9 @@ void drawPageOneBare()
     g_object_unref(document);
 }
 
-const platform::components::PreviewLimits& limits()
+const screens::PreviewLimits& limits()
 {
-    static const platform::components::PreviewLimits made{
+    static const screens::PreviewLimits made{
         .maxImageWidth = screenWidth, .maxImageHeight = screenHeight};
     return made;
 }
@@ -196,7 +196,7 @@ void photoToFirstPixels(benchmark::State& state)
     compare(
         state,
         [] {
-            const auto content = platform::components::loadPreview(drive().url("Photo.jpg"), limits());
+            const auto content = screens::loadPreview(drive().url("Photo.jpg"), limits());
             benchmark::DoNotOptimize(content.picture.frames.front().image.pixels().data());
         },
         decodeBare);
@@ -207,8 +207,8 @@ void bookToFirstPixels(benchmark::State& state)
     compare(
         state,
         [] {
-            const auto content = platform::components::loadPreview(drive().url("Book.pdf"), limits());
-            const auto view = std::make_shared<platform::components::PreviewPagesView>();
+            const auto content = screens::loadPreview(drive().url("Book.pdf"), limits());
+            const auto view = std::make_shared<screens::PreviewPagesView>();
             view->userResized(screenWidth, 1);
             view->setDocument(content.pages, content.firstPage);
             view->userSees({0, 0, screenWidth, screenHeight});

@@ -39,7 +39,7 @@ std::string logText(const PresentedType& type)
     return text ? *text : "(null)";
 }
 
-void logNewList(const std::shared_ptr<const platform::components::DocumentListController>& list)
+void logNewList(const std::shared_ptr<const screens::DocumentListController>& list)
 {
     static constexpr Operation op{"-[NavController initNewListController:]"};
     op.debug("New DLC (%d items): \"%@\", UTI=%@, URL=%@", list->containedItemCount(), list->title(),

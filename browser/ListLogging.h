@@ -6,7 +6,7 @@
 #include <memory>
 #include <string>
 
-namespace platform::components {
+namespace screens {
 class DocumentListController;
 }
 
@@ -17,23 +17,23 @@ namespace tarrow {
 
 /// Reads as the URLs of a list's items; the list may be null.
 struct ContainedItems {
-    std::shared_ptr<const platform::components::DocumentListController> list;
+    std::shared_ptr<const screens::DocumentListController> list;
 };
 std::string logText(const ContainedItems& items);
 
 /// Reads as the URLs of the items that are selected in a list, which may be null.
 struct SelectedItems {
-    std::shared_ptr<const platform::components::DocumentListController> list;
+    std::shared_ptr<const screens::DocumentListController> list;
 };
 std::string logText(const SelectedItems& items);
 
 /// Reads as the content type of the folder that a list shows.
 struct PresentedType {
-    std::shared_ptr<const platform::components::DocumentListController> list;
+    std::shared_ptr<const screens::DocumentListController> list;
 };
 std::string logText(const PresentedType& type);
 
 /// Logs a list that is about to be shown and, line by line, its items.
-void logNewList(const std::shared_ptr<const platform::components::DocumentListController>& list);
+void logNewList(const std::shared_ptr<const screens::DocumentListController>& list);
 
 } // namespace tarrow

@@ -22,10 +22,10 @@ using platform::ByteCountStyle;
 using platform::ByteCountUnit;
 using platform::Operation;
 using platform::services;
-using platform::components::DocumentListAction;
-using platform::components::DocumentListController;
-using platform::ui::BarButtonItem;
-using platform::ui::SystemItem;
+using screens::DocumentListAction;
+using screens::DocumentListController;
+using kit::BarButtonItem;
+using kit::SystemItem;
 
 namespace {
 
@@ -85,7 +85,7 @@ void NavController::configureNavBar(const List& list)
 NavController::Sender NavController::makeToolbarButton(
     const std::string& title, void (NavController::*operation)(const Sender&))
 {
-    const auto button = std::make_shared<platform::ui::Button>(title);
+    const auto button = std::make_shared<kit::Button>(title);
     button->sizeToFit();
     auto item = std::make_shared<BarButtonItem>(button);
     button->setAction([weak = std::weak_ptr(self()), sender = std::weak_ptr(item), operation] {

@@ -23,9 +23,9 @@ namespace tarrow {
 
 using platform::localized;
 using platform::localizedPlural;
-using platform::components::DocumentListAction;
-using platform::components::MoveTargetPicker;
-using platform::components::MoveTargetScope;
+using screens::DocumentListAction;
+using screens::MoveTargetPicker;
+using screens::MoveTargetScope;
 
 namespace {
 
@@ -65,7 +65,7 @@ void NavController::documentListControllerPerformActionURL(const List& list, int
 }
 
 void NavController::documentListControllerPerformActionURLOriginatingViewCompletion(const List& list,
-    int action, const Url& url, const std::shared_ptr<platform::ui::View>& originatingView,
+    int action, const Url& url, const std::shared_ptr<kit::View>& originatingView,
     const Completion& completion)
 {
     static constexpr Operation op{
@@ -112,7 +112,7 @@ void NavController::documentListControllerPerformActionURLOriginatingViewComplet
 }
 
 void NavController::performDelete(
-    const Url& url, const std::shared_ptr<platform::ui::View>& originatingView, const Completion& completion)
+    const Url& url, const std::shared_ptr<kit::View>& originatingView, const Completion& completion)
 {
     _performActionCompletionBlock = completion;
     showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(
@@ -200,7 +200,7 @@ void NavController::showMoveTargetForItemsInFolder(
     const auto picker = MoveTargetPicker::initWithItemsScope(
         items, mayLeave ? MoveTargetScope::AllContainers : MoveTargetScope::Container);
     picker->setDelegate(self());
-    picker->setPresentationStyle(platform::ui::PresentationStyle::OverCurrentContext);
+    picker->setPresentationStyle(kit::PresentationStyle::OverCurrentContext);
     visibleViewController()->presentViewController(picker, true, [] { op.debug("Presented moveTarget"); });
 }
 
@@ -275,7 +275,7 @@ void NavController::showWarningAndDeleteDocument(const Sender&)
 }
 
 void NavController::showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(
-    const std::vector<Url>& urls, const std::shared_ptr<platform::ui::View>& view, const List& list,
+    const std::vector<Url>& urls, const std::shared_ptr<kit::View>& view, const List& list,
     const Completion& finished)
 {
     static constexpr Operation op{
@@ -315,7 +315,7 @@ void NavController::deleteConfirmed(const std::vector<Url>& urls, const Completi
 }
 
 void NavController::showDICUrlCompletion(
-    const std::shared_ptr<platform::ui::View>& originatingView, const Url& url, const Completion& completion)
+    const std::shared_ptr<kit::View>& originatingView, const Url& url, const Completion& completion)
 {
     static constexpr Operation op{"-[NavController showDIC:url:completion:]"};
     op.userAction("Show Share Sheet (nav)");
@@ -328,7 +328,7 @@ void NavController::showDICUrlCompletion(
     const auto bounds = anchor->bounds();
     const auto rect =
         originatingView ? platform::Rect{bounds.x, bounds.midY(), bounds.width, 0} : platform::Rect{};
-    const auto sheet = platform::components::DocumentInteractionSheet::interactionControllerWithURL(resolved);
+    const auto sheet = screens::DocumentInteractionSheet::interactionControllerWithURL(resolved);
     const auto& containers = services().cloudDocumentService().containers();
     const auto container = containers.containerForItem(resolved);
     if (containers.isContainerTopFolder(resolved) && container && *container)

@@ -23,7 +23,7 @@
 
 namespace tarrow {
 
-using platform::components::DocumentListController;
+using screens::DocumentListController;
 
 namespace {
 
@@ -131,7 +131,7 @@ void NavController::showPreviewPreviewMode(const std::shared_ptr<DRItem>& item, 
 
 bool NavController::isSearchPresented() const
 {
-    return std::dynamic_pointer_cast<platform::ui::SearchPresentation>(presentedViewController()) != nullptr;
+    return std::dynamic_pointer_cast<kit::SearchPresentation>(presentedViewController()) != nullptr;
 }
 
 void NavController::dismissPresentedScreen()

@@ -24,9 +24,9 @@
 namespace tarrow {
 
 using platform::Notification;
-using platform::components::DocumentListController;
-using platform::components::UnavailableScreen;
-using platform::components::UpgradeFlow;
+using screens::DocumentListController;
+using screens::UnavailableScreen;
+using screens::UpgradeFlow;
 
 namespace {
 

@@ -22,10 +22,10 @@ namespace platform {
 class Operation;
 class PropertyValue;
 } // namespace platform
-namespace platform::components {
+namespace screens {
 class UpgradeFlow;
 }
-namespace platform::ui {
+namespace kit {
 class BarButtonItem;
 }
 
@@ -38,28 +38,28 @@ class PreviewItemManager;
 /// The browser: a stack of the drive's folder lists with a preview on top of them, or the screen that says
 /// that the drive is not available. It follows the cloud account and keeps the line under each list up to
 /// date. Made with std::make_shared. Main thread only.
-class NavController : public platform::ui::NavigationController,
-                      public platform::ui::NavigationControllerDelegate,
-                      public platform::components::DocumentListControllerDelegate,
-                      public platform::components::MoveTargetPickerDelegate,
-                      public platform::components::DocumentInteractionSheetDelegate,
+class NavController : public kit::NavigationController,
+                      public kit::NavigationControllerDelegate,
+                      public screens::DocumentListControllerDelegate,
+                      public screens::MoveTargetPickerDelegate,
+                      public screens::DocumentInteractionSheetDelegate,
                       public QuotaFetcherDelegate,
                       public DocumentListControllerStatusBarDelegate {
 public:
-    using Screen = std::shared_ptr<platform::ui::ViewController>;
+    using Screen = std::shared_ptr<kit::ViewController>;
 
     ~NavController() override;
 
     // The edit mode's toolbar; null outside it.
-    const std::shared_ptr<platform::ui::BarButtonItem>& barButtonNewFolder() const
+    const std::shared_ptr<kit::BarButtonItem>& barButtonNewFolder() const
     {
         return _barButtonNewFolder;
     }
-    const std::shared_ptr<platform::ui::BarButtonItem>& barButtonMoveItem() const
+    const std::shared_ptr<kit::BarButtonItem>& barButtonMoveItem() const
     {
         return _barButtonMoveItem;
     }
-    const std::shared_ptr<platform::ui::BarButtonItem>& barButtonDeleteItem() const
+    const std::shared_ptr<kit::BarButtonItem>& barButtonDeleteItem() const
     {
         return _barButtonDeleteItem;
     }
@@ -81,7 +81,7 @@ public:
     /// The name prompt that was shown last.
     const std::shared_ptr<FilenamePrompt>& folderPromptAlert() const { return _folderPromptAlert; }
     /// The share sheet that was shown last.
-    const std::shared_ptr<platform::components::DocumentInteractionSheet>&
+    const std::shared_ptr<screens::DocumentInteractionSheet>&
     documentInteractionController() const
     {
         return _documentInteractionController;
@@ -89,7 +89,7 @@ public:
     /// The completion of the last list action that deletes or shares.
     const Completion& performActionCompletionBlock() const { return _performActionCompletionBlock; }
     /// The storage upgrade that was started last.
-    const std::shared_ptr<platform::components::UpgradeFlow>& upgradeFlowMgr() const
+    const std::shared_ptr<screens::UpgradeFlow>& upgradeFlowMgr() const
     {
         return _upgradeFlowMgr;
     }
@@ -131,7 +131,7 @@ public:
     bool okToShowQuota() const { return _lastQuotaFetch.has_value(); }
 
     // Edit mode: several items are chosen with check marks.
-    using Sender = std::shared_ptr<platform::ui::BarButtonItem>; ///< what was pressed; null: nothing
+    using Sender = std::shared_ptr<kit::BarButtonItem>; ///< what was pressed; null: nothing
     void beginEditMode(const Sender& sender);
     void endEditMode(const Sender& sender);
     /// Selects everything that the list on top contains.
@@ -171,7 +171,7 @@ public:
     Screen documentListControllerViewControllerForPreviewingItemAtURL(
         const List& list, const platform::Url& url) override;
     void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,
-        const platform::Url& url, const std::shared_ptr<platform::ui::View>& originatingView,
+        const platform::Url& url, const std::shared_ptr<kit::View>& originatingView,
         const Completion& completion) override;
     void documentListControllerPerformActionURL(
         const List& list, int action, const platform::Url& url) override;
@@ -190,10 +190,10 @@ public:
     void showMoveTargetForItemsInFolder(
         const std::vector<platform::Url>& items, const std::optional<platform::Url>& folder);
     void documentTargetSelectionControllerDidSelectItemAtURL(
-        const std::shared_ptr<platform::components::MoveTargetPicker>& picker,
+        const std::shared_ptr<screens::MoveTargetPicker>& picker,
         const platform::Url& folder) override;
     /// Shows what can be done with an item outside the drive, at a view or, without one, at the browser's.
-    void showDICUrlCompletion(const std::shared_ptr<platform::ui::View>& view, const platform::Url& url,
+    void showDICUrlCompletion(const std::shared_ptr<kit::View>& view, const platform::Url& url,
         const Completion& completion);
     /// Asks for an item's new name.
     void showRenamePrompt(const platform::Url& url);
@@ -208,7 +208,7 @@ public:
     /// Asks before items (documents and folders, or app libraries) are deleted, at a view or at the toolbar's
     /// button. The finisher (may be empty) is called once, after the answer or a refusal.
     void showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(
-        const std::vector<platform::Url>& urls, const std::shared_ptr<platform::ui::View>& view,
+        const std::vector<platform::Url>& urls, const std::shared_ptr<kit::View>& view,
         const List& list, const Completion& finished);
 
 private:
@@ -225,7 +225,7 @@ private:
     void showVanishedItem(const platform::Url& url);
     void openFolder(const platform::Url& url, const platform::Operation& op);
     void openDocument(const std::shared_ptr<DRItem>& item, const platform::Operation& op);
-    void performDelete(const platform::Url& url, const std::shared_ptr<platform::ui::View>& view,
+    void performDelete(const platform::Url& url, const std::shared_ptr<kit::View>& view,
         const Completion& completion);
     void performInfo(const platform::Url& url);
     void deleteConfirmed(const std::vector<platform::Url>& urls, const Completion& finished);
@@ -233,19 +233,19 @@ private:
     Sender makeToolbarButton(const std::string& title, void (NavController::*operation)(const Sender&));
     void configureEditToolbar(const List& list);
 
-    std::shared_ptr<platform::ui::BarButtonItem> _barButtonNewFolder, _barButtonMoveItem,
+    std::shared_ptr<kit::BarButtonItem> _barButtonNewFolder, _barButtonMoveItem,
         _barButtonDeleteItem;
-    std::shared_ptr<platform::components::DocumentInteractionSheet> _documentInteractionController;
+    std::shared_ptr<screens::DocumentInteractionSheet> _documentInteractionController;
     bool _editMode = false;
     bool _pickerIsAlive = false;
-    std::weak_ptr<platform::ui::ViewController> _splitViewController;
+    std::weak_ptr<kit::ViewController> _splitViewController;
     std::string _viewTitle;
     std::optional<platform::Date> _lastQuotaFetch;
     std::shared_ptr<QuotaFetcher> _quotaFetcher;
     std::shared_ptr<PreviewItemManager> _itemManager;
     std::shared_ptr<FilenamePrompt> _folderPromptAlert;
     Completion _performActionCompletionBlock;
-    std::shared_ptr<platform::components::UpgradeFlow> _upgradeFlowMgr;
+    std::shared_ptr<screens::UpgradeFlow> _upgradeFlowMgr;
     std::shared_ptr<const platform::StorageOffer> _upgradeOffer;
     std::uint64_t _quotaBytes = 0;
     std::vector<platform::Observation> _observations;

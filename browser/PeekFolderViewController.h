@@ -8,21 +8,21 @@
 namespace tarrow {
 
 /// The folder list that a peek at a folder shows. Main thread.
-class PeekFolderViewController : public platform::components::DocumentListController {
+class PeekFolderViewController : public screens::DocumentListController {
 public:
     static std::shared_ptr<PeekFolderViewController> initWithURL(const platform::Url& url);
 
     using DocumentListController::DocumentListController;
 
     /// Actions that the peek itself would offer; the program sets none.
-    const platform::ui::Menu& previewActionItems() const { return _previewActionItems; }
-    void setPreviewActionItems(platform::ui::Menu items) { _previewActionItems = std::move(items); }
+    const kit::Menu& previewActionItems() const { return _previewActionItems; }
+    void setPreviewActionItems(kit::Menu items) { _previewActionItems = std::move(items); }
 
     /// A peek has no room for a search field.
     bool shouldShowSearch() const override { return false; }
 
 private:
-    platform::ui::Menu _previewActionItems;
+    kit::Menu _previewActionItems;
 };
 
 } // namespace tarrow

@@ -13,8 +13,8 @@
 namespace tarrow {
 
 using platform::AppHandle;
-using platform::components::DocumentInteractionSheet;
-using platform::components::DocumentListController;
+using screens::DocumentInteractionSheet;
+using screens::DocumentListController;
 
 namespace {
 
@@ -146,7 +146,7 @@ std::optional<std::string> LaunchUtils::defaultAppNameForDocumentRequireOpenIn(
 }
 
 bool LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(
-    const Url& url, const std::shared_ptr<platform::ui::ViewController>& viewController, bool requireOpenIn)
+    const Url& url, const std::shared_ptr<kit::ViewController>& viewController, bool requireOpenIn)
 {
     static constexpr Operation op{"+[LaunchUtils openInDefaultApp:viewController:requireOpenIn:]"};
     op.info("Opening document %@ in default app", url);

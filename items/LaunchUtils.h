@@ -11,7 +11,7 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 class ViewController;
 }
 
@@ -26,7 +26,7 @@ public:
 
     /// Opens a document in its default app; whether it was. The screen is where the platform may ask first.
     static bool openInDefaultAppViewControllerRequireOpenIn(const Url& url,
-        const std::shared_ptr<platform::ui::ViewController>& viewController, bool requireOpenIn);
+        const std::shared_ptr<kit::ViewController>& viewController, bool requireOpenIn);
 
     /// The app that a document, promised or here, is opened in; nothing when there is none. Images, movies,
     /// sounds and PDF documents of the default container have none. In an app library the library's own app

@@ -8,7 +8,7 @@
 #include <cstddef>
 #include <vector>
 
-namespace platform::components {
+namespace screens {
 class DocumentListController;
 }
 
@@ -19,7 +19,7 @@ namespace tarrow {
 /// declared depth of folders is kept. Where the container cannot be found nothing is offered. Main thread.
 class MenuEnableChecks {
 public:
-    using List = platform::components::DocumentListController;
+    using List = screens::DocumentListController;
 
     MenuEnableChecks() = delete;
 

@@ -16,11 +16,11 @@ namespace tarrow {
 
 using platform::Operation;
 using platform::Url;
-using platform::components::PreviewController;
-using platform::components::PreviewControllerDataSource;
-using platform::components::PreviewControllerDelegate;
-using platform::ui::BarButtonItem;
-using platform::ui::SystemItem;
+using screens::PreviewController;
+using screens::PreviewControllerDataSource;
+using screens::PreviewControllerDelegate;
+using kit::BarButtonItem;
+using kit::SystemItem;
 using Button = std::shared_ptr<BarButtonItem>;
 
 std::shared_ptr<LookwellItemController> LookwellItemController::defaultController()
@@ -66,9 +66,9 @@ void LookwellItemController::viewWillDisappear(bool animated)
     PreviewController::viewWillDisappear(animated);
 }
 
-void LookwellItemController::showOtherApps(const Url& item, const std::shared_ptr<platform::ui::View>& from)
+void LookwellItemController::showOtherApps(const Url& item, const std::shared_ptr<kit::View>& from)
 {
-    using platform::components::DocumentInteractionSheet;
+    using screens::DocumentInteractionSheet;
     const auto sheet = DocumentInteractionSheet::interactionControllerWithURL(item);
     if (const auto manager = itemManager())
         manager->setDocumentInteractionController(sheet);

@@ -17,9 +17,9 @@ class PreviewItemManager;
 
 /// The quick preview: the screen that shows the content of the manager's item. There is one for the whole
 /// process. Main thread only.
-class LookwellItemController : public platform::components::PreviewController,
-                               private platform::components::PreviewControllerDataSource,
-                               private platform::components::PreviewControllerDelegate {
+class LookwellItemController : public screens::PreviewController,
+                               private screens::PreviewControllerDataSource,
+                               private screens::PreviewControllerDelegate {
 public:
     /// The process's one, made on the first call.
     static std::shared_ptr<LookwellItemController> defaultController();
@@ -32,8 +32,8 @@ public:
     const std::optional<std::vector<platform::Url>>& arrayOfDocuments() const { return _arrayOfDocuments; }
 
     /// What a peek of the preview offers to do: nothing.
-    const platform::ui::Menu& previewActionItems() const { return _previewActionItems; }
-    void setPreviewActionItems(platform::ui::Menu items) { _previewActionItems = std::move(items); }
+    const kit::Menu& previewActionItems() const { return _previewActionItems; }
+    void setPreviewActionItems(kit::Menu items) { _previewActionItems = std::move(items); }
 
     /// Makes a manager the current one and shows its item.
     void lookwellNewItem(const std::shared_ptr<PreviewItemManager>& manager);
@@ -45,28 +45,28 @@ public:
     void viewWillDisappear(bool animated) override;
 
     // What the buttons in the navigation bar do.
-    void showMoveTarget(const std::shared_ptr<platform::ui::BarButtonItem>& sender);
-    void showWarningAndDeleteDocument(const std::shared_ptr<platform::ui::BarButtonItem>& sender);
+    void showMoveTarget(const std::shared_ptr<kit::BarButtonItem>& sender);
+    void showWarningAndDeleteDocument(const std::shared_ptr<kit::BarButtonItem>& sender);
 
 private:
     void addButtons();
     /// What else can be done with a document that has no preview.
-    void showOtherApps(const platform::Url& item, const std::shared_ptr<platform::ui::View>& from);
+    void showOtherApps(const platform::Url& item, const std::shared_ptr<kit::View>& from);
     std::size_t numberOfPreviewItemsInPreviewController(
-        const platform::components::PreviewController& controller) const override;
+        const screens::PreviewController& controller) const override;
     platform::Url previewControllerPreviewItemAtIndex(
-        const platform::components::PreviewController& controller, std::size_t index) const override;
+        const screens::PreviewController& controller, std::size_t index) const override;
     bool previewControllerCanEditItem(
-        const platform::components::PreviewController& controller, const platform::Url& item) override;
+        const screens::PreviewController& controller, const platform::Url& item) override;
     bool previewControllerShouldSaveEditedItem(
-        const platform::components::PreviewController& controller, const platform::Url& item) override;
+        const screens::PreviewController& controller, const platform::Url& item) override;
 
     bool previewControllerWantsDefaultMediaPlayer(
-        const platform::components::PreviewController& controller, const platform::Url& item) override;
+        const screens::PreviewController& controller, const platform::Url& item) override;
 
     std::weak_ptr<PreviewItemManager> _itemManager;
     std::optional<std::vector<platform::Url>> _arrayOfDocuments;
-    platform::ui::Menu _previewActionItems;
+    kit::Menu _previewActionItems;
 };
 
 } // namespace tarrow

@@ -23,14 +23,14 @@
 namespace tarrow {
 
 using platform::Operation;
-using platform::components::DocumentInteractionSheet;
-using platform::ui::BarButtonItem;
-using platform::ui::BarButtonItems;
-using platform::ui::InterfaceOrientation;
-using platform::ui::LayoutConstraint;
-using platform::ui::SizeClass;
-using platform::ui::SystemItem;
-using platform::ui::View;
+using screens::DocumentInteractionSheet;
+using kit::BarButtonItem;
+using kit::BarButtonItems;
+using kit::InterfaceOrientation;
+using kit::LayoutConstraint;
+using kit::SizeClass;
+using kit::SystemItem;
+using kit::View;
 
 namespace {
 
@@ -60,12 +60,12 @@ void PreviewBaseViewController::loadView()
     _wrapperView = std::make_shared<View>();
     _wrapperView->setPlacedByFrame(false);
     _wrapperView->setDebugName("WrapperView");
-    _scrollView = std::make_shared<platform::ui::ScrollView>();
+    _scrollView = std::make_shared<kit::ScrollView>();
     _scrollView->setPlacedByFrame(false);
     _scrollView->setScrollBehavior({.showsHorizontalIndicator = false,
         .showsVerticalIndicator = false,
-        .horizontalBounce = platform::ui::Bounce::Never,
-        .verticalBounce = platform::ui::Bounce::Always});
+        .horizontalBounce = kit::Bounce::Never,
+        .verticalBounce = kit::Bounce::Always});
     view()->addSubview(_scrollView);
     _contentView->addSubview(_wrapperView);
     _scrollView->addSubview(_contentView);
@@ -97,10 +97,10 @@ void PreviewBaseViewController::setupConstraints()
 {
     if (!navigationController() || _parentBottomConstraint)
         return;
-    platform::ui::VisualFormatInput input;
+    kit::VisualFormatInput input;
     input.views = {{"scrollView", _scrollView}, {"contentView", _contentView}};
     for (const auto* format : {"H:|[scrollView]|", "V:|[scrollView]|"})
-        LayoutConstraint::activate(platform::ui::VisualFormat::constraints(format, input));
+        LayoutConstraint::activate(kit::VisualFormat::constraints(format, input));
     _parentLeadingConstraint = _wrapperView->leadingAnchor().equalTo(_contentView->leadingAnchor());
     _parentTrailingConstraint = _wrapperView->trailingAnchor().equalTo(_contentView->trailingAnchor());
     _parentTopConstraint = _wrapperView->topAnchor().equalTo(_contentView->topAnchor());
@@ -111,7 +111,7 @@ void PreviewBaseViewController::setupConstraints()
 }
 
 /// A window may become a tablet's or a phone's while it is shown.
-void PreviewBaseViewController::traitsDidChange(const platform::ui::TraitCollection& previous)
+void PreviewBaseViewController::traitsDidChange(const kit::TraitCollection& previous)
 {
     ViewController::traitsDidChange(previous);
     if (_barButtonActionItem && isVisible())
@@ -133,7 +133,7 @@ platform::EdgeInsets PreviewBaseViewController::scrollViewDefaultEdgeInsets() co
 {
     platform::EdgeInsets insets;
     // The shorter side is the status bar's thickness, however the device is held.
-    if (const auto& screen = platform::ui::Screen::main())
+    if (const auto& screen = kit::Screen::main())
         insets.top = std::min(screen->statusBarFrame.width, screen->statusBarFrame.height);
     if (const auto navigation = navigationController()) {
         insets.top += navigation->barFrames().navigationBar.height;

@@ -11,10 +11,10 @@
 
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 class Button;
 class ScrollView;
-} // namespace platform::ui
+} // namespace kit
 
 namespace tarrow {
 
@@ -22,9 +22,9 @@ class PreviewItemManager;
 
 /// What the program's own preview screens have in common: content that scrolls between the bars, and the
 /// buttons to share, delete and move the item of the manager that made the screen. Main thread only.
-class PreviewBaseViewController : public platform::ui::ViewController {
+class PreviewBaseViewController : public kit::ViewController {
 public:
-    using Button = std::shared_ptr<platform::ui::BarButtonItem>;
+    using Button = std::shared_ptr<kit::BarButtonItem>;
 
     std::shared_ptr<PreviewItemManager> itemManager() const { return _itemManager.lock(); }
     void setItemManager(std::weak_ptr<PreviewItemManager> manager) { _itemManager = std::move(manager); }
@@ -32,10 +32,10 @@ public:
     void setMode(int mode) { _mode = mode; }
 
     // Null before the view is loaded.
-    const std::shared_ptr<platform::ui::ScrollView>& scrollView() const { return _scrollView; }
-    const std::shared_ptr<platform::ui::View>& contentView() const { return _contentView; }
+    const std::shared_ptr<kit::ScrollView>& scrollView() const { return _scrollView; }
+    const std::shared_ptr<kit::View>& contentView() const { return _contentView; }
     /// Where subclasses put their content.
-    const std::shared_ptr<platform::ui::View>& wrapperView() const { return _wrapperView; }
+    const std::shared_ptr<kit::View>& wrapperView() const { return _wrapperView; }
 
     // The wrapper's edges against those of the content view; null before the first appearance.
     const auto& parentLeadingConstraint() const { return _parentLeadingConstraint; }
@@ -53,7 +53,7 @@ public:
     void viewWillAppear(bool animated) override;
     void viewWillDisappear(bool animated) override;
     void viewWillLayoutSubviews() override;
-    void traitsDidChange(const platform::ui::TraitCollection& previous) override;
+    void traitsDidChange(const kit::TraitCollection& previous) override;
 
     void setupConstraints();
     /// How much of the screen lies under the bars; points.
@@ -63,7 +63,7 @@ public:
     int currentPseudoOrientation() const;
     void configureButtons();
     /// The button that opens the item in another app, for the navigation bar of a phone; null: none.
-    virtual std::shared_ptr<platform::ui::Button> openInAppNavControllerButton() { return nullptr; }
+    virtual std::shared_ptr<kit::Button> openInAppNavControllerButton() { return nullptr; }
     /// The item may have changed. Overriders call this first.
     virtual void refreshItem();
 
@@ -74,19 +74,19 @@ public:
     void showMoveTarget(const Button& sender);
 
 private:
-    using Constraint = std::shared_ptr<platform::ui::LayoutConstraint>;
+    using Constraint = std::shared_ptr<kit::LayoutConstraint>;
 
     std::shared_ptr<PreviewBaseViewController> self();
     Button makeButton(
-        platform::ui::SystemItem symbol, void (PreviewBaseViewController::*action)(const Button&));
+        kit::SystemItem symbol, void (PreviewBaseViewController::*action)(const Button&));
     Button wrappedOpenInButton();
     void enableButtons();
     bool hasItemURL() const;
 
     std::weak_ptr<PreviewItemManager> _itemManager;
     int _mode = PreviewModeDetails;
-    std::shared_ptr<platform::ui::ScrollView> _scrollView;
-    std::shared_ptr<platform::ui::View> _contentView, _wrapperView;
+    std::shared_ptr<kit::ScrollView> _scrollView;
+    std::shared_ptr<kit::View> _contentView, _wrapperView;
     Constraint _parentLeadingConstraint, _parentTrailingConstraint, _parentTopConstraint,
         _parentBottomConstraint;
     Button _barButtonActionItem, _barButtonDeleteItem, _barButtonMoveItem;

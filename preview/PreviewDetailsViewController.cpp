@@ -11,7 +11,7 @@
 
 namespace tarrow {
 
-using platform::components::PlaceholderView;
+using screens::PlaceholderView;
 
 namespace {
 

@@ -7,7 +7,7 @@
 
 #include <memory>
 
-namespace platform::components {
+namespace screens {
 class PlaceholderView;
 }
 
@@ -20,10 +20,10 @@ public:
     void refreshItem() override;
 
     /// Null before the view is loaded.
-    const std::shared_ptr<platform::components::PlaceholderView>& summaryView() const { return _summaryView; }
+    const std::shared_ptr<screens::PlaceholderView>& summaryView() const { return _summaryView; }
 
 private:
-    std::shared_ptr<platform::components::PlaceholderView> _summaryView;
+    std::shared_ptr<screens::PlaceholderView> _summaryView;
 };
 
 } // namespace tarrow

@@ -17,8 +17,8 @@ namespace tarrow {
 using platform::Operation;
 using platform::services;
 using platform::Url;
-using platform::components::MoveTargetPicker;
-using platform::components::MoveTargetScope;
+using screens::MoveTargetPicker;
+using screens::MoveTargetScope;
 
 namespace {
 
@@ -54,7 +54,7 @@ PreviewItemManager::Screen PreviewItemManager::screenForAlerts(const Screen& wan
 }
 
 void PreviewItemManager::showWarningAndDeleteDocumentBarButton(
-    const Screen& screen, const std::shared_ptr<platform::ui::BarButtonItem>& button)
+    const Screen& screen, const std::shared_ptr<kit::BarButtonItem>& button)
 {
     static constexpr Operation op{"-[PreviewItemManager showWarningAndDeleteDocument:barButton:]"};
     const auto url = itemURL();
@@ -96,7 +96,7 @@ void PreviewItemManager::showMoveTarget(const Screen& screen)
     const auto picker = MoveTargetPicker::initWithItemsScope(
         items, trw_canCrossZoneMoveURLs(items) ? MoveTargetScope::AllContainers : MoveTargetScope::Container);
     picker->setDelegate(weak_from_this());
-    picker->setPresentationStyle(platform::ui::PresentationStyle::OverCurrentContext);
+    picker->setPresentationStyle(kit::PresentationStyle::OverCurrentContext);
     presenter->presentViewController(picker, true, [] { op.debug("Presented moveTarget"); });
 }
 

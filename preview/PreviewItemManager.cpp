@@ -25,10 +25,10 @@ using platform::Notification;
 using platform::Operation;
 using platform::services;
 using platform::Url;
-using platform::components::DocumentListController;
-using platform::ui::NavigationController;
-using platform::ui::SearchPresentation;
-using platform::ui::ViewController;
+using screens::DocumentListController;
+using kit::NavigationController;
+using kit::SearchPresentation;
+using kit::ViewController;
 
 namespace {
 
@@ -99,7 +99,7 @@ void PreviewItemManager::setNavigationController(std::weak_ptr<NavigationControl
 }
 
 void PreviewItemManager::setDocumentInteractionController(
-    std::shared_ptr<platform::components::DocumentInteractionSheet> sheet)
+    std::shared_ptr<screens::DocumentInteractionSheet> sheet)
 {
     _documentInteractionController = std::move(sheet);
 }

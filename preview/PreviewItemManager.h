@@ -22,7 +22,7 @@
 namespace platform {
 struct UserActivity;
 } // namespace platform
-namespace platform::components {
+namespace screens {
 class DocumentInteractionSheet;
 }
 
@@ -37,14 +37,14 @@ class PreviewDetailsViewController;
 /// while it is shown. Main thread, but for the presenter's calls; it ends on the main thread, whoever drops
 /// it.
 class PreviewItemManager : public platform::FilePresenter,
-                           public platform::components::MoveTargetPickerDelegate,
+                           public screens::MoveTargetPickerDelegate,
                            public std::enable_shared_from_this<PreviewItemManager> {
 public:
-    using Screen = std::shared_ptr<platform::ui::ViewController>;
-    using ListStack = std::vector<std::shared_ptr<platform::components::DocumentListController>>;
+    using Screen = std::shared_ptr<kit::ViewController>;
+    using ListStack = std::vector<std::shared_ptr<screens::DocumentListController>>;
 
     static std::shared_ptr<PreviewItemManager> newItemManagerWithModeNavController(
-        int mode, const std::shared_ptr<platform::ui::NavigationController>& navigationController);
+        int mode, const std::shared_ptr<kit::NavigationController>& navigationController);
     /// Without a navigation controller the manager prepares screens but shows none.
     static std::shared_ptr<PreviewItemManager> init();
 
@@ -55,19 +55,19 @@ public:
     std::shared_ptr<DRItem> item() const;
     int mode() const { return _mode; }
     void setMode(int mode) { _mode = mode; }
-    std::shared_ptr<platform::ui::NavigationController> navigationController() const
+    std::shared_ptr<kit::NavigationController> navigationController() const
     {
         return _navigationController.lock();
     }
-    void setNavigationController(std::weak_ptr<platform::ui::NavigationController> navigationController);
+    void setNavigationController(std::weak_ptr<kit::NavigationController> navigationController);
     /// The share sheet that was opened last; kept only so that it lives while it is shown.
-    const std::shared_ptr<platform::components::DocumentInteractionSheet>&
+    const std::shared_ptr<screens::DocumentInteractionSheet>&
     documentInteractionController() const
     {
         return _documentInteractionController;
     }
     void setDocumentInteractionController(
-        std::shared_ptr<platform::components::DocumentInteractionSheet> sheet);
+        std::shared_ptr<screens::DocumentInteractionSheet> sheet);
     /// Where the presenter's calls arrive.
     const std::shared_ptr<platform::OperationQueue>& fcQueue() const { return _fcQueue; }
     /// The content's date as it was seen last.
@@ -95,7 +95,7 @@ public:
     void replaceLastViewController(const Screen& screen);
     bool isPreviewControllerDisplayed(const Screen& screen) const;
     /// A preview screen tells that it goes.
-    void viewControllerWillDisappear(const platform::ui::ViewController& screen);
+    void viewControllerWillDisappear(const kit::ViewController& screen);
 
     /// The lists from the drive's top level to the folder of a URL; nothing when it leads to no folder of the
     /// drive.
@@ -108,10 +108,10 @@ public:
 
     // Actions of the preview screens. Files are changed off the main thread.
     void showWarningAndDeleteDocumentBarButton(
-        const Screen& screen, const std::shared_ptr<platform::ui::BarButtonItem>& button);
+        const Screen& screen, const std::shared_ptr<kit::BarButtonItem>& button);
     void showMoveTarget(const Screen& screen);
     void documentTargetSelectionControllerDidSelectItemAtURL(
-        const std::shared_ptr<platform::components::MoveTargetPicker>& picker,
+        const std::shared_ptr<screens::MoveTargetPicker>& picker,
         const platform::Url& folder) override;
 
     // The presenter: what others do to the item, while registered. Any thread.
@@ -150,8 +150,8 @@ private:
     std::shared_ptr<platform::OperationQueue> _fcQueue;
     std::optional<platform::Date> _modifiedDate;
     std::shared_ptr<PreviewDetailsViewController> _detailsViewController;
-    std::shared_ptr<platform::components::DocumentInteractionSheet> _documentInteractionController;
-    std::weak_ptr<platform::ui::NavigationController> _navigationController;
+    std::shared_ptr<screens::DocumentInteractionSheet> _documentInteractionController;
+    std::weak_ptr<kit::NavigationController> _navigationController;
     std::vector<platform::Observation> _observations;
 
     mutable std::mutex _mutex; ///< of the fields below

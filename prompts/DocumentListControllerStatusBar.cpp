@@ -13,11 +13,11 @@
 namespace tarrow {
 
 using platform::Operation;
-using platform::components::DocumentListController;
-using platform::components::StorageUpgradeButton;
-using platform::ui::BarButtonItem;
-using platform::ui::Font;
-using platform::ui::SystemItem;
+using screens::DocumentListController;
+using screens::StorageUpgradeButton;
+using kit::BarButtonItem;
+using kit::Font;
+using kit::SystemItem;
 
 namespace {
 
@@ -35,11 +35,11 @@ bool isToBeShown(const Offer& offer)
     return offer && StorageUpgradeButton::shouldShowForOffer(offer);
 }
 
-std::shared_ptr<platform::ui::Label> makePrimaryLabel()
+std::shared_ptr<kit::Label> makePrimaryLabel()
 {
-    auto label = std::make_shared<platform::ui::Label>();
+    auto label = std::make_shared<kit::Label>();
     // The toolbar does not grow with the user's text size, so neither may the line in it.
-    label->setFont(Font::preferred(platform::ui::TextStyle::Caption2).fixed());
+    label->setFont(Font::preferred(kit::TextStyle::Caption2).fixed());
     label->setTextColor(platform::Color::black());
     label->sizeToFit();
     return label;
@@ -51,7 +51,7 @@ void DocumentListControllerStatusBar::createStatusBarButtonPressDelegate(
     const Offer& offer, const std::shared_ptr<DocumentListControllerStatusBarDelegate>& delegate)
 {
     _delegate = delegate;
-    const auto& screen = platform::ui::Screen::main();
+    const auto& screen = kit::Screen::main();
     _labelsView = DriveStatusLabelView::initWithFrame(screen ? screen->statusBarFrame : platform::Rect{});
     configureLabels(offer);
     _toolbarItems = {std::make_shared<BarButtonItem>(SystemItem::FlexibleSpace),

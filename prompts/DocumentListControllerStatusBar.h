@@ -9,10 +9,10 @@
 #include <memory>
 #include <string>
 
-namespace platform::components {
+namespace screens {
 class DocumentListController;
 class StorageUpgradeButton;
-} // namespace platform::components
+} // namespace screens
 
 namespace tarrow {
 
@@ -42,31 +42,31 @@ public:
     void showUpgradeOffer(const Offer& offer);
     /// The button was pressed: its link's own action is performed; a link without one that leaves the upgrade
     /// to the application is left to the delegate.
-    void upgradeStoragePressed(const platform::components::StorageUpgradeButton& button);
+    void upgradeStoragePressed(const screens::StorageUpgradeButton& button);
 
     const std::shared_ptr<DriveStatusLabelView>& labelsView() const { return _labelsView; }
     std::shared_ptr<DocumentListControllerStatusBarDelegate> delegate() const { return _delegate.lock(); }
     /// Flexible space, the content, flexible space.
-    const platform::ui::BarButtonItems& toolbarItems() const { return _toolbarItems; }
+    const kit::BarButtonItems& toolbarItems() const { return _toolbarItems; }
 
 private:
     std::shared_ptr<DriveStatusLabelView> _labelsView;
     std::weak_ptr<DocumentListControllerStatusBarDelegate> _delegate;
-    platform::ui::BarButtonItems _toolbarItems;
+    kit::BarButtonItems _toolbarItems;
 };
 
 // The status bar of a folder list, which owns it.
 
 /// Null before it is created.
 std::shared_ptr<DocumentListControllerStatusBar> statusBar(
-    const platform::components::DocumentListController& list);
-void setStatusBar(platform::components::DocumentListController& list,
+    const screens::DocumentListController& list);
+void setStatusBar(screens::DocumentListController& list,
     std::shared_ptr<DocumentListControllerStatusBar> statusBar);
 /// Creates a status bar for the list, in place of an earlier one.
-void createStatusBarButtonPressDelegate(platform::components::DocumentListController& list,
+void createStatusBarButtonPressDelegate(screens::DocumentListController& list,
     const DocumentListControllerStatusBar::Offer& offer,
     const std::shared_ptr<DocumentListControllerStatusBarDelegate>& delegate);
 /// Puts the status bar into the list's toolbar.
-void displayStatusBar(platform::components::DocumentListController& list);
+void displayStatusBar(screens::DocumentListController& list);
 
 } // namespace tarrow

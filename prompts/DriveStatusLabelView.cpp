@@ -19,7 +19,7 @@ constexpr double gapToLabelHeight = 0.25;
 /// The line stands this much above the middle (points), which looks centred over a toolbar's lower edge.
 constexpr double lift = 1.0;
 
-Rect fittedFrame(platform::ui::View* view)
+Rect fittedFrame(kit::View* view)
 {
     if (!view)
         return {};
@@ -29,8 +29,8 @@ Rect fittedFrame(platform::ui::View* view)
 
 Rect placed(Rect frame, double x, double y)
 {
-    frame.x = platform::ui::View::roundToPixel(x);
-    frame.y = platform::ui::View::roundToPixel(y);
+    frame.x = kit::View::roundToPixel(x);
+    frame.y = kit::View::roundToPixel(y);
     return frame;
 }
 
@@ -52,7 +52,7 @@ DriveStatusLabelView::DriveStatusLabelView(const Rect& frame)
     setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
 }
 
-void DriveStatusLabelView::setQuotaButton(std::shared_ptr<platform::components::StorageUpgradeButton> button)
+void DriveStatusLabelView::setQuotaButton(std::shared_ptr<screens::StorageUpgradeButton> button)
 {
     _quotaButton = std::move(button);
 }

@@ -8,31 +8,31 @@
 #include <memory>
 #include <string>
 
-namespace platform::components {
+namespace screens {
 class StorageUpgradeButton;
 }
-namespace platform::ui {
+namespace kit {
 class Label;
 }
 
 namespace tarrow {
 
 /// The status line under a folder list, centred, with the upgrade button below it while storage is low.
-class DriveStatusLabelView : public platform::ui::View {
+class DriveStatusLabelView : public kit::View {
 public:
     /// A view that grows and shrinks with what it stands in. It has no label and no button yet.
     static std::shared_ptr<DriveStatusLabelView> initWithFrame(const platform::Rect& frame);
     explicit DriveStatusLabelView(const platform::Rect& frame);
 
     /// The status line; null before it is set.
-    const std::shared_ptr<platform::ui::Label>& primaryLabel() const { return _primaryLabel; }
-    void setPrimaryLabel(std::shared_ptr<platform::ui::Label> label) { _primaryLabel = std::move(label); }
+    const std::shared_ptr<kit::Label>& primaryLabel() const { return _primaryLabel; }
+    void setPrimaryLabel(std::shared_ptr<kit::Label> label) { _primaryLabel = std::move(label); }
     /// The upgrade button; null before it is set.
-    const std::shared_ptr<platform::components::StorageUpgradeButton>& quotaButton() const
+    const std::shared_ptr<screens::StorageUpgradeButton>& quotaButton() const
     {
         return _quotaButton;
     }
-    void setQuotaButton(std::shared_ptr<platform::components::StorageUpgradeButton> button);
+    void setQuotaButton(std::shared_ptr<screens::StorageUpgradeButton> button);
 
     void setPrimaryLabelText(const std::string& text);
 
@@ -52,8 +52,8 @@ private:
     Block block(double labelHeight, double titleHeight) const;
     double titleHeight(double labelHeight) const;
 
-    std::shared_ptr<platform::ui::Label> _primaryLabel;
-    std::shared_ptr<platform::components::StorageUpgradeButton> _quotaButton;
+    std::shared_ptr<kit::Label> _primaryLabel;
+    std::shared_ptr<screens::StorageUpgradeButton> _quotaButton;
     bool _showLowQuota = false;
 };
 

@@ -16,10 +16,10 @@
 namespace tarrow {
 
 using platform::localized;
-using platform::ui::AlertAction;
-using platform::ui::AlertActionStyle;
-using platform::ui::AlertController;
-using platform::ui::TextField;
+using kit::AlertAction;
+using kit::AlertActionStyle;
+using kit::AlertController;
+using kit::TextField;
 
 namespace {
 
@@ -78,7 +78,7 @@ void FilenamePrompt::build(const Texts& texts, ValidateNewFilenameCallback compl
     _origFilename = texts.filename;
     _validateNewFilenameCallback = std::move(completion);
     _alert = std::make_shared<AlertController>(
-        texts.title.value_or(""), texts.message.value_or(""), platform::ui::AlertStyle::Alert);
+        texts.title.value_or(""), texts.message.value_or(""), kit::AlertStyle::Alert);
     addTextField(texts);
     addCancelAction({});
     addDefaultAction(texts.doneButtonText);
@@ -92,11 +92,11 @@ void FilenamePrompt::addTextField(const Texts& texts)
     _alert->addTextField([&](TextField& field) {
         field.setText(texts.filename.value_or(""));
         field.setPlaceholder(texts.placeholder.value_or(""));
-        field.setInputTraits({.returnKey = platform::ui::ReturnKey::Done,
+        field.setInputTraits({.returnKey = kit::ReturnKey::Done,
             .returnKeyNeedsText = true,
-            .capitalization = platform::ui::Capitalization::Words,
-            .autocorrection = platform::ui::Autocorrection::Off,
-            .clearButton = platform::ui::ClearButton::WhileEditing});
+            .capitalization = kit::Capitalization::Words,
+            .autocorrection = kit::Autocorrection::Off,
+            .clearButton = kit::ClearButton::WhileEditing});
         field.setDelegate(weak_from_this());
         field.setOnEditingChanged([weak = weak_from_this(), edited = field.weak_from_this()] {
             const auto prompt = weak.lock();
@@ -106,7 +106,7 @@ void FilenamePrompt::addTextField(const Texts& texts)
         });
         field.setPlacedByFrame(false);
         const double height = field.font().lineHeight() * fieldHeightToLineHeight;
-        field.anchor(platform::ui::LayoutAttribute::Height).equalToConstant(height)->setActive(true);
+        field.anchor(kit::LayoutAttribute::Height).equalToConstant(height)->setActive(true);
     });
 }
 

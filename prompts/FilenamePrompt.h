@@ -10,10 +10,10 @@
 #include <optional>
 #include <string>
 
-namespace platform::ui {
+namespace kit {
 class AlertAction;
 class AlertController;
-} // namespace platform::ui
+} // namespace kit
 
 namespace tarrow {
 
@@ -24,7 +24,7 @@ class SimpleTextViewController;
 ///
 /// The caller presents the alert and keeps the prompt while it is shown: the alert knows the prompt only
 /// weakly, and closes for nothing but Cancel once the prompt is gone. Main thread.
-class FilenamePrompt : public platform::ui::TextFieldDelegate,
+class FilenamePrompt : public kit::TextFieldDelegate,
                        public std::enable_shared_from_this<FilenamePrompt> {
 public:
     /// Called with the name, without white space around it, when the user confirms. Sets `accepted` to close
@@ -40,13 +40,13 @@ public:
         const MaybeText& title, const MaybeText& message, const MaybeText& placeholder,
         const MaybeText& filename, const MaybeText& doneButtonText, ValidateNewFilenameCallback completion);
 
-    const std::shared_ptr<platform::ui::AlertController>& alert() const { return _alert; }
+    const std::shared_ptr<kit::AlertController>& alert() const { return _alert; }
     const std::shared_ptr<SimpleTextViewController>& errMsgViewController() const
     {
         return _errMsgViewController;
     }
     /// The confirming button.
-    const std::shared_ptr<platform::ui::AlertAction>& defaultAction() const { return _defaultAction; }
+    const std::shared_ptr<kit::AlertAction>& defaultAction() const { return _defaultAction; }
     /// The name that the field begins with; nothing for a new folder.
     const MaybeText& origFilename() const { return _origFilename; }
     const ValidateNewFilenameCallback& validateNewFilenameCallback() const
@@ -59,10 +59,10 @@ public:
     /// Shows a message in red; an empty one hides the area.
     void updateErrorMessage(const std::string& message);
     /// The user edited the name; null does nothing.
-    void folderPromptTextFieldChanged(const platform::ui::TextField* field);
+    void folderPromptTextFieldChanged(const kit::TextField* field);
 
-    bool textFieldShouldReturn(platform::ui::TextField& field) override;
-    void textFieldDidBeginEditing(platform::ui::TextField& field) override;
+    bool textFieldShouldReturn(kit::TextField& field) override;
+    void textFieldDidBeginEditing(kit::TextField& field) override;
 
 protected:
     struct Texts {
@@ -81,9 +81,9 @@ private:
     void addCancelAction(std::function<void()> handler);
     void addDefaultAction(const MaybeText& text);
 
-    std::shared_ptr<platform::ui::AlertController> _alert;
+    std::shared_ptr<kit::AlertController> _alert;
     std::shared_ptr<SimpleTextViewController> _errMsgViewController;
-    std::shared_ptr<platform::ui::AlertAction> _defaultAction;
+    std::shared_ptr<kit::AlertAction> _defaultAction;
     MaybeText _origFilename;
     ValidateNewFilenameCallback _validateNewFilenameCallback;
     bool _isAccepted = false;

@@ -9,10 +9,10 @@
 
 namespace tarrow {
 
-using platform::ui::Font;
-using platform::ui::Label;
-using platform::ui::LayoutAttribute;
-using platform::ui::LayoutConstraint;
+using kit::Font;
+using kit::Label;
+using kit::LayoutAttribute;
+using kit::LayoutConstraint;
 
 namespace {
 
@@ -22,7 +22,7 @@ constexpr int mostLines = 5;
 
 Font SimpleTextViewController::messageLabelFont() const
 {
-    return Font::preferred(platform::ui::TextStyle::Footnote);
+    return Font::preferred(kit::TextStyle::Footnote);
 }
 
 void SimpleTextViewController::viewDidLoad()
@@ -30,7 +30,7 @@ void SimpleTextViewController::viewDidLoad()
     _messageLabel = std::make_shared<Label>();
     _messageLabel->setMaxLines(mostLines);
     _messageLabel->setFont(messageLabelFont());
-    _messageLabel->setTextColor(platform::ui::StandardColors::red);
+    _messageLabel->setTextColor(kit::StandardColors::red);
     view()->addSubview(_messageLabel);
     constrainLabel();
 }
@@ -39,8 +39,8 @@ void SimpleTextViewController::constrainLabel()
 {
     using enum LayoutAttribute;
     _messageLabel->setPlacedByFrame(false);
-    for (const auto axis : {platform::ui::Axis::Horizontal, platform::ui::Axis::Vertical})
-        view()->setHugging(platform::ui::LayoutPriorities::required, axis);
+    for (const auto axis : {kit::Axis::Horizontal, kit::Axis::Vertical})
+        view()->setHugging(kit::LayoutPriorities::required, axis);
     const auto label = [this](LayoutAttribute attribute) { return _messageLabel->anchor(attribute); };
     const auto edge = [this](LayoutAttribute attribute) { return view()->anchor(attribute); };
     LayoutConstraint::activate({

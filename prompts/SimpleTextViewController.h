@@ -6,7 +6,7 @@
 #include "kit/controllers/ViewController.h"
 #include "kit/values/Font.h"
 
-namespace platform::ui {
+namespace kit {
 class Label;
 }
 
@@ -14,11 +14,11 @@ namespace tarrow {
 
 /// A short message in red, as tall as its text, for the inside of an alert. Made with std::make_shared. Main
 /// thread.
-class SimpleTextViewController : public platform::ui::ViewController {
+class SimpleTextViewController : public kit::ViewController {
 public:
     /// Null before the view is loaded.
-    const std::shared_ptr<platform::ui::Label>& messageLabel() const { return _messageLabel; }
-    platform::ui::Font messageLabelFont() const;
+    const std::shared_ptr<kit::Label>& messageLabel() const { return _messageLabel; }
+    kit::Font messageLabelFont() const;
 
     void viewDidLoad() override;
 
@@ -27,7 +27,7 @@ private:
     double _labelHorizontalInsets() const { return 16.0; }
     void constrainLabel();
 
-    std::shared_ptr<platform::ui::Label> _messageLabel;
+    std::shared_ptr<kit::Label> _messageLabel;
 };
 
 } // namespace tarrow

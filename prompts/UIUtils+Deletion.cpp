@@ -11,9 +11,9 @@
 namespace tarrow {
 
 using platform::localized;
-using platform::ui::AlertAction;
-using platform::ui::AlertActionStyle;
-using platform::ui::AlertController;
+using kit::AlertAction;
+using kit::AlertActionStyle;
+using kit::AlertController;
 
 namespace {
 
@@ -23,14 +23,14 @@ constexpr Operation op{"+[UIUtils showDeleteWarningAlert:hasContainer:viewContro
                        "completion:]"};
 
 /// A line across the view's middle, from whose ends the popover's arrow may come.
-platform::ui::PopoverAnchor anchorOf(const std::shared_ptr<platform::ui::View>& view,
-    const std::shared_ptr<platform::ui::BarButtonItem>& button)
+kit::PopoverAnchor anchorOf(const std::shared_ptr<kit::View>& view,
+    const std::shared_ptr<kit::BarButtonItem>& button)
 {
     if (!view)
         return std::weak_ptr(button);
     const auto bounds = view->bounds();
-    return platform::ui::ViewAnchor{
-        view, {bounds.x, bounds.midY(), bounds.width, 0}, platform::ui::ArrowDirections::LeftOrRight};
+    return kit::ViewAnchor{
+        view, {bounds.x, bounds.midY(), bounds.width, 0}, kit::ArrowDirections::LeftOrRight};
 }
 
 std::shared_ptr<AlertAction> deleteAction(const UIUtils::DeleteCompletion& completion)
@@ -55,15 +55,15 @@ std::shared_ptr<AlertAction> cancelAction(const UIUtils::DeleteCompletion& compl
 
 void UIUtils::showDeleteWarningAlertHasContainerViewControllerUsingViewUsingButtonCompletion(
     const std::vector<Url>& items, bool /*hasContainer*/, const Screen& parent,
-    const std::shared_ptr<platform::ui::View>& view,
-    const std::shared_ptr<platform::ui::BarButtonItem>& button, DeleteCompletion completion)
+    const std::shared_ptr<kit::View>& view,
+    const std::shared_ptr<kit::BarButtonItem>& button, DeleteCompletion completion)
 {
     const auto message = items.empty() ? std::nullopt : messageForDeletePrompt(items);
     if (!message || !parent) {
         completion(nullptr, true);
         return;
     }
-    const auto sheet = std::make_shared<AlertController>("", *message, platform::ui::AlertStyle::ActionSheet);
+    const auto sheet = std::make_shared<AlertController>("", *message, kit::AlertStyle::ActionSheet);
     sheet->addAction(deleteAction(completion));
     sheet->addAction(cancelAction(completion));
     sheet->setPopoverAnchor(anchorOf(view, button));

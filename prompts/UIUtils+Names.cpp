@@ -10,8 +10,8 @@
 
 namespace tarrow {
 
-using platform::ui::TextField;
-using platform::ui::TextRange;
+using kit::TextField;
+using kit::TextRange;
 
 namespace {
 

@@ -13,8 +13,8 @@ namespace tarrow {
 using platform::Error;
 using platform::FileErrorCode;
 using platform::localized;
-using platform::ui::AlertAction;
-using platform::ui::AlertController;
+using kit::AlertAction;
+using kit::AlertController;
 
 namespace {
 
@@ -57,8 +57,8 @@ void UIUtils::showAlertMessageParentViewController(
 {
     if (!parent)
         return;
-    const auto alert = std::make_shared<AlertController>(title, message, platform::ui::AlertStyle::Alert);
-    alert->addAction(std::make_shared<AlertAction>(localized("OK"), platform::ui::AlertActionStyle::Default));
+    const auto alert = std::make_shared<AlertController>(title, message, kit::AlertStyle::Alert);
+    alert->addAction(std::make_shared<AlertAction>(localized("OK"), kit::AlertActionStyle::Default));
     parent->presentViewController(alert, true);
 }
 
@@ -140,8 +140,8 @@ void UIUtils::showInvalidItemNameAlertParentViewController(const std::string& na
 
 bool UIUtils::tabulaMode()
 {
-    const auto& screen = platform::ui::Screen::main();
-    return screen && screen->idiom == platform::ui::UserInterfaceIdiom::Tablet;
+    const auto& screen = kit::Screen::main();
+    return screen && screen->idiom == kit::UserInterfaceIdiom::Tablet;
 }
 
 void UIUtils::addChildViewControllerChildViewController(const Screen& parent, const Screen& child)

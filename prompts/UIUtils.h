@@ -12,14 +12,14 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 class AlertAction;
 class BarButtonItem;
 class TextField;
 class View;
 class ViewController;
 struct TextRange;
-} // namespace platform::ui
+} // namespace kit
 
 namespace tarrow {
 
@@ -27,11 +27,11 @@ namespace tarrow {
 /// is shown over its parent; without a parent it is not shown. Titles and messages may be empty. Main thread.
 class UIUtils {
 public:
-    using Screen = std::shared_ptr<platform::ui::ViewController>;
+    using Screen = std::shared_ptr<kit::ViewController>;
     using MaybeError = std::optional<platform::Error>;
     /// Called once with the button that was pressed (null: nothing was shown) and whether the user cancelled.
     using DeleteCompletion =
-        std::function<void(const std::shared_ptr<platform::ui::AlertAction>& button, bool cancelled)>;
+        std::function<void(const std::shared_ptr<kit::AlertAction>& button, bool cancelled)>;
 
     UIUtils() = delete;
 
@@ -44,8 +44,8 @@ public:
     /// whatever its letter case.
     static platform::Url computeNewURLNewBasename(const platform::Url& url, const std::string& name);
     /// Puts the caret before the last dot; without one it stays where it is.
-    static void setCursorInTextFieldToBeforeExtension(platform::ui::TextField& field);
-    static void selectTextInTextFieldRange(platform::ui::TextField& field, platform::ui::TextRange range);
+    static void setCursorInTextFieldToBeforeExtension(kit::TextField& field);
+    static void selectTextInTextFieldRange(kit::TextField& field, kit::TextRange range);
 
     // Errors. Only an error's code is looked at, not its domain.
     /// What a name prompt says about an error; empty without one.
@@ -76,8 +76,8 @@ public:
     /// nothing here.
     static void showDeleteWarningAlertHasContainerViewControllerUsingViewUsingButtonCompletion(
         const std::vector<platform::Url>& items, bool hasContainer, const Screen& parent,
-        const std::shared_ptr<platform::ui::View>& view,
-        const std::shared_ptr<platform::ui::BarButtonItem>& button, DeleteCompletion completion);
+        const std::shared_ptr<kit::View>& view,
+        const std::shared_ptr<kit::BarButtonItem>& button, DeleteCompletion completion);
     /// What will be lost; nothing when the one item cannot be read or has no name. Reads that item.
     static std::optional<std::string> messageForDeletePrompt(const std::vector<platform::Url>& items);
 

@@ -4,25 +4,26 @@
 #include "screens/AlertParts.h"
 
 #include "platform/Localization.h"
+#include "screens/PlatformNames.h"
 
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
-std::shared_ptr<ui::AlertAction> alertAction(
-    std::string title, ui::AlertActionStyle style, std::function<void()> act)
+std::shared_ptr<kit::AlertAction> alertAction(
+    std::string title, kit::AlertActionStyle style, std::function<void()> act)
 {
-    return std::make_shared<ui::AlertAction>(std::move(title), style, [act = std::move(act)](const auto&) {
+    return std::make_shared<kit::AlertAction>(std::move(title), style, [act = std::move(act)](const auto&) {
         if (act)
             act();
     });
 }
 
-std::shared_ptr<ui::AlertController> messageAlert(const std::string& title, const std::string& words)
+std::shared_ptr<kit::AlertController> messageAlert(const std::string& title, const std::string& words)
 {
-    auto alert = std::make_shared<ui::AlertController>(title, words, ui::AlertStyle::Alert);
-    alert->addAction(alertAction(localized("OK"), ui::AlertActionStyle::Default));
+    auto alert = std::make_shared<kit::AlertController>(title, words, kit::AlertStyle::Alert);
+    alert->addAction(alertAction(localized("OK"), kit::AlertActionStyle::Default));
     return alert;
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -9,12 +9,12 @@
 #include <memory>
 #include <string>
 
-namespace platform::components {
+namespace screens {
 
 /// A button of an alert that does something, or nothing but to close it.
-std::shared_ptr<ui::AlertAction> alertAction(
-    std::string title, ui::AlertActionStyle style, std::function<void()> act = {});
+std::shared_ptr<kit::AlertAction> alertAction(
+    std::string title, kit::AlertActionStyle style, std::function<void()> act = {});
 /// A message that is closed with OK.
-std::shared_ptr<ui::AlertController> messageAlert(const std::string& title, const std::string& words);
+std::shared_ptr<kit::AlertController> messageAlert(const std::string& title, const std::string& words);
 
-} // namespace platform::components
+} // namespace screens

@@ -4,8 +4,9 @@
 #include "screens/DetailText.h"
 
 #include "platform/Localization.h"
+#include "screens/PlatformNames.h"
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -28,4 +29,4 @@ std::string joinedPlace(const std::string& folder, const std::string& inner)
     return joined("%1$@ › %2$@", folder, inner);
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -4,10 +4,11 @@
 #include "screens/DisplayName.h"
 
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 
 #include <algorithm>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -65,4 +66,4 @@ std::string_view nameExtension(std::string_view name)
     return dot == std::string_view::npos || dot == 0 ? std::string_view() : name.substr(dot + 1);
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -6,7 +6,7 @@
 #include <string>
 #include <string_view>
 
-namespace platform::components {
+namespace screens {
 
 /// A file name as text for the screen: bytes that are no UTF-8 show as the replacement character, as does
 /// what turns the direction of the text and so could disguise an extension; control characters show as a
@@ -16,4 +16,4 @@ std::string displayName(std::string_view bytes);
 /// The extension of a name without its dot; empty for none.
 std::string_view nameExtension(std::string_view name);
 
-} // namespace platform::components
+} // namespace screens

@@ -14,13 +14,13 @@
 #include <algorithm>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
-using ui::AlertAction;
-using ui::AlertActionStyle;
-using ui::AlertController;
+using kit::AlertAction;
+using kit::AlertActionStyle;
+using kit::AlertController;
 
 /// The apps that work on a document where it lies, this program left out, those that own its type first.
 std::vector<AppHandle> appsFor(const Url& document)
@@ -62,21 +62,21 @@ bool DocumentInteractionSheet::openDocumentInPlaceInApp(const AppHandle& app) co
 }
 
 void DocumentInteractionSheet::presentOptionsMenuFromRectInView(
-    const std::shared_ptr<ui::ViewController>& presenter, const Rect& rect,
-    const std::shared_ptr<ui::View>& view, bool animated)
+    const std::shared_ptr<kit::ViewController>& presenter, const Rect& rect,
+    const std::shared_ptr<kit::View>& view, bool animated)
 {
-    present(presenter, ui::ViewAnchor{view, rect}, animated);
+    present(presenter, kit::ViewAnchor{view, rect}, animated);
 }
 
 void DocumentInteractionSheet::presentOptionsMenuFromBarButtonItem(
-    const std::shared_ptr<ui::ViewController>& presenter, const std::shared_ptr<ui::BarButtonItem>& item,
+    const std::shared_ptr<kit::ViewController>& presenter, const std::shared_ptr<kit::BarButtonItem>& item,
     bool animated)
 {
     present(presenter, std::weak_ptr(item), animated);
 }
 
 void DocumentInteractionSheet::present(
-    const std::shared_ptr<ui::ViewController>& presenter, ui::PopoverAnchor anchor, bool animated)
+    const std::shared_ptr<kit::ViewController>& presenter, kit::PopoverAnchor anchor, bool animated)
 {
     _presenter = presenter;
     _anchor = std::move(anchor);
@@ -97,7 +97,7 @@ std::shared_ptr<AlertController> DocumentInteractionSheet::makeMenu(Apps apps)
     const bool isHere = contentIsHere();
     const auto menu = std::make_shared<AlertController>(_name,
         isHere ? std::string() : localized("The content is in the cloud. Open the document to download it."),
-        ui::AlertStyle::ActionSheet);
+        kit::AlertStyle::ActionSheet);
     for (std::size_t i = 0; i < std::min(apps.size(), directApps); ++i)
         addApp(*menu, apps[i]);
     if (apps.size() > directApps)
@@ -120,7 +120,7 @@ std::shared_ptr<AlertController> DocumentInteractionSheet::makeMenu(Apps apps)
 
 std::shared_ptr<AlertController> DocumentInteractionSheet::makeAppMenu(const Apps& apps)
 {
-    const auto menu = std::make_shared<AlertController>(_name, std::string(), ui::AlertStyle::ActionSheet);
+    const auto menu = std::make_shared<AlertController>(_name, std::string(), kit::AlertStyle::ActionSheet);
     for (const auto& app : apps)
         addApp(*menu, app);
     addCancel(*menu);
@@ -199,9 +199,9 @@ void DocumentInteractionSheet::showFailure(const std::string& title, const std::
     const auto presenter = _presenter.lock();
     if (!presenter)
         return;
-    const auto alert = std::make_shared<AlertController>(title, message, ui::AlertStyle::Alert);
+    const auto alert = std::make_shared<AlertController>(title, message, kit::AlertStyle::Alert);
     alert->addAction(std::make_shared<AlertAction>(localized("OK"), AlertActionStyle::Cancel));
     presenter->presentViewController(alert, true);
 }
 
-} // namespace platform::components
+} // namespace screens

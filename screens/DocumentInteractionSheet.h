@@ -8,6 +8,7 @@
 #include "platform/Error.h"
 #include "platform/Geometry.h"
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 
 #include <functional>
 #include <memory>
@@ -15,14 +16,14 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 class AlertController;
 class BarButtonItem;
 class View;
 class ViewController;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 class DocumentInteractionSheet;
 
@@ -62,24 +63,24 @@ public:
     bool openDocumentInPlaceInApp(const AppHandle& app) const;
 
     /// Shows the menu over a screen, pointing at a rectangle of a view.
-    void presentOptionsMenuFromRectInView(const std::shared_ptr<ui::ViewController>& presenter,
-        const Rect& rect, const std::shared_ptr<ui::View>& view, bool animated);
+    void presentOptionsMenuFromRectInView(const std::shared_ptr<kit::ViewController>& presenter,
+        const Rect& rect, const std::shared_ptr<kit::View>& view, bool animated);
     /// The same, pointing at a button of a bar.
-    void presentOptionsMenuFromBarButtonItem(const std::shared_ptr<ui::ViewController>& presenter,
-        const std::shared_ptr<ui::BarButtonItem>& item, bool animated);
+    void presentOptionsMenuFromBarButtonItem(const std::shared_ptr<kit::ViewController>& presenter,
+        const std::shared_ptr<kit::BarButtonItem>& item, bool animated);
 
 private:
     using Apps = std::vector<AppHandle>;
     using Action = void (DocumentInteractionSheet::*)();
 
     void present(
-        const std::shared_ptr<ui::ViewController>& presenter, ui::PopoverAnchor anchor, bool animated);
-    std::shared_ptr<ui::AlertController> makeMenu(Apps apps);
-    std::shared_ptr<ui::AlertController> makeAppMenu(const Apps& apps);
-    void showMenu(const std::shared_ptr<ui::AlertController>& menu, bool animated);
-    void addApp(ui::AlertController& menu, const AppHandle& app);
-    void add(ui::AlertController& menu, const std::string& title, Action action);
-    void addCancel(ui::AlertController& menu);
+        const std::shared_ptr<kit::ViewController>& presenter, kit::PopoverAnchor anchor, bool animated);
+    std::shared_ptr<kit::AlertController> makeMenu(Apps apps);
+    std::shared_ptr<kit::AlertController> makeAppMenu(const Apps& apps);
+    void showMenu(const std::shared_ptr<kit::AlertController>& menu, bool animated);
+    void addApp(kit::AlertController& menu, const AppHandle& app);
+    void add(kit::AlertController& menu, const std::string& title, Action action);
+    void addCancel(kit::AlertController& menu);
     bool contentIsHere() const;
     std::function<void(const std::optional<Error>&)> reportFailure();
 
@@ -95,8 +96,8 @@ private:
     Url _url;
     std::string _name;
     std::weak_ptr<DocumentInteractionSheetDelegate> _delegate;
-    std::weak_ptr<ui::ViewController> _presenter;
-    ui::PopoverAnchor _anchor;
+    std::weak_ptr<kit::ViewController> _presenter;
+    kit::PopoverAnchor _anchor;
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -9,7 +9,7 @@
 
 #include <cerrno>
 
-namespace platform::components {
+namespace screens {
 
 bool saysItemIsGone(const Error& error)
 {
@@ -40,4 +40,4 @@ std::string errorWords(const Error& error)
     return localized("It could not be read.");
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -4,10 +4,11 @@
 #pragma once
 
 #include "platform/Error.h"
+#include "screens/PlatformNames.h"
 
 #include <string>
 
-namespace platform::components {
+namespace screens {
 
 /// Why something cannot be shown, in a sentence for the person: the error's own words where it has some.
 std::string errorWords(const Error& error);
@@ -15,4 +16,4 @@ std::string errorWords(const Error& error);
 /// Whether an error says that the item is not there any more.
 bool saysItemIsGone(const Error& error);
 
-} // namespace platform::components
+} // namespace screens

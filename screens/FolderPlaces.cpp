@@ -8,7 +8,7 @@
 #include "screens/DetailText.h"
 #include "screens/DisplayName.h"
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -98,4 +98,4 @@ std::vector<Url> searchableFolders()
     return folders;
 }
 
-} // namespace platform::components
+} // namespace screens

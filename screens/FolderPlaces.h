@@ -5,12 +5,13 @@
 
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 
 #include <optional>
 #include <string>
 #include <vector>
 
-namespace platform::components {
+namespace screens {
 
 /// The documents folder of the default container, the drive's top level; nothing when there is none.
 std::optional<Url> rootFolder();
@@ -33,4 +34,4 @@ std::vector<FolderSnapshot::ExtraItem> extraItemsOf(const Url& folder);
 /// library.
 std::vector<Url> foldersDownTo(const Url& folder);
 
-} // namespace platform::components
+} // namespace screens

@@ -8,10 +8,11 @@
 #include "kit/views/ImageView.h"
 #include "kit/views/Label.h"
 #include "kit/views/StackView.h"
+#include "screens/PlatformNames.h"
 
 #include <initializer_list>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -20,17 +21,17 @@ constexpr double lineSpacing = 12;
 /// Of a plain symbol: what is said is in the words. An icon in colour is what the screen is about.
 constexpr double symbolAlpha = 0.5;
 
-std::shared_ptr<ui::Label> makeLabel(const ui::Font& font)
+std::shared_ptr<kit::Label> makeLabel(const kit::Font& font)
 {
-    const auto label = std::make_shared<ui::Label>();
+    const auto label = std::make_shared<kit::Label>();
     label->setFont(font);
     label->setMaxLines(0);
-    label->setLineBreak(ui::LineBreak::WordWrap);
-    label->setAlignment(ui::TextAlignment::Center);
+    label->setLineBreak(kit::LineBreak::WordWrap);
+    label->setAlignment(kit::TextAlignment::Center);
     return label;
 }
 
-void show(ui::Label& label, const std::string& text)
+void show(kit::Label& label, const std::string& text)
 {
     label.setText(text);
     label.setHidden(text.empty());
@@ -47,22 +48,22 @@ std::shared_ptr<PlaceholderView> PlaceholderView::create()
 
 void PlaceholderView::build()
 {
-    _spinner = std::make_shared<ui::ActivityIndicator>();
-    _icon = std::make_shared<ui::ImageView>();
-    _icon->setContentMode(ui::ContentMode::AspectFit);
+    _spinner = std::make_shared<kit::ActivityIndicator>();
+    _icon = std::make_shared<kit::ImageView>();
+    _icon->setContentMode(kit::ContentMode::AspectFit);
     _icon->setAccessibility({.label = {}, .hint = {}, .isHidden = true});
-    _title = makeLabel(ui::Font::preferred(ui::TextStyle::Title2).bold());
-    _message = makeLabel(ui::Font::preferred(ui::TextStyle::Body));
-    _message->setTextColor(ui::StandardColors::gray);
-    _stack = std::make_shared<ui::StackView>(ui::Axis::Vertical);
+    _title = makeLabel(kit::Font::preferred(kit::TextStyle::Title2).bold());
+    _message = makeLabel(kit::Font::preferred(kit::TextStyle::Body));
+    _message->setTextColor(kit::StandardColors::gray);
+    _stack = std::make_shared<kit::StackView>(kit::Axis::Vertical);
     for (const auto& part :
-        std::initializer_list<std::shared_ptr<ui::View>>{_spinner, _icon, _title, _message})
+        std::initializer_list<std::shared_ptr<kit::View>>{_spinner, _icon, _title, _message})
         _stack->addArrangedSubview(part);
-    _stack->setStackAlignment(ui::StackAlignment::Center);
+    _stack->setStackAlignment(kit::StackAlignment::Center);
     _stack->setSpacing(lineSpacing);
     _stack->setPlacedByFrame(false);
     addSubview(_stack);
-    ui::LayoutConstraint::activate({
+    kit::LayoutConstraint::activate({
         _stack->centerXAnchor().equalTo(centerXAnchor()),
         _stack->centerYAnchor().equalTo(centerYAnchor()),
         _stack->widthAnchor().lessThanOrEqualTo(widthAnchor(), -2 * margin),
@@ -90,4 +91,4 @@ void PlaceholderView::setContent(const Content& content)
     setNeedsLayout();
 }
 
-} // namespace platform::components
+} // namespace screens

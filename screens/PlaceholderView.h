@@ -8,18 +8,18 @@
 #include <memory>
 #include <string>
 
-namespace platform::ui {
+namespace kit {
 class ActivityIndicator;
 class ImageView;
 class Label;
 class StackView;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 /// What a screen shows in place of content: an icon, what is the matter, and what to do about it, centred and
 /// never wider than it can be read. Main thread only.
-class PlaceholderView : public ui::View {
+class PlaceholderView : public kit::View {
 public:
     struct Content {
         std::string iconName{}; ///< of the icon theme; empty: none
@@ -34,7 +34,7 @@ public:
     static constexpr double maximumWidth = 420; ///< points, of the text
     static constexpr double iconSide = 96; ///< points
 
-    using ui::View::View;
+    using kit::View::View;
 
     const Content& content() const { return _content; }
     void setContent(const Content& content);
@@ -43,10 +43,10 @@ private:
     void build();
 
     Content _content;
-    std::shared_ptr<ui::StackView> _stack;
-    std::shared_ptr<ui::ActivityIndicator> _spinner;
-    std::shared_ptr<ui::ImageView> _icon;
-    std::shared_ptr<ui::Label> _title, _message;
+    std::shared_ptr<kit::StackView> _stack;
+    std::shared_ptr<kit::ActivityIndicator> _spinner;
+    std::shared_ptr<kit::ImageView> _icon;
+    std::shared_ptr<kit::Label> _title, _message;
 };
 
-} // namespace platform::components
+} // namespace screens

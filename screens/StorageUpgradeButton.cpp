@@ -8,7 +8,7 @@
 
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 bool StorageUpgradeLink::performDefaultAction() const
 {
@@ -26,9 +26,9 @@ bool StorageUpgradeButton::shouldShowForOffer(const std::shared_ptr<const Storag
 }
 
 StorageUpgradeButton::StorageUpgradeButton()
-    : ui::Button(localized("Upgrade Storage"))
+    : kit::Button(localized("Upgrade Storage"))
 {
-    setTitleFont(ui::Font::preferred(ui::TextStyle::Caption2));
+    setTitleFont(kit::Font::preferred(kit::TextStyle::Caption2));
 }
 
 void StorageUpgradeButton::setOffer(std::shared_ptr<const StorageOffer> offer)
@@ -43,4 +43,4 @@ StorageUpgradeLink StorageUpgradeButton::link() const
     return StorageUpgradeLink(_offer ? _offer->link : StorageOfferLink());
 }
 
-} // namespace platform::components
+} // namespace screens

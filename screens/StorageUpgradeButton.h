@@ -5,10 +5,11 @@
 
 #include "kit/views/Button.h"
 #include "platform/StorageOffers.h"
+#include "screens/PlatformNames.h"
 
 #include <memory>
 
-namespace platform::components {
+namespace screens {
 
 /// Where a storage upgrade button leads.
 class StorageUpgradeLink {
@@ -28,7 +29,7 @@ private:
 };
 
 /// The button that leads to more storage. Main thread only.
-class StorageUpgradeButton : public ui::Button {
+class StorageUpgradeButton : public kit::Button {
 public:
     static std::shared_ptr<StorageUpgradeButton> createButton();
     /// Whether the button should be shown for an offer: when storage is running low.
@@ -46,4 +47,4 @@ private:
     std::shared_ptr<const StorageOffer> _offer;
 };
 
-} // namespace platform::components
+} // namespace screens

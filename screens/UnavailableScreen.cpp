@@ -5,8 +5,9 @@
 
 #include "platform/Localization.h"
 #include "screens/PlaceholderView.h"
+#include "screens/PlatformNames.h"
 
-namespace platform::components {
+namespace screens {
 
 std::shared_ptr<UnavailableScreen> UnavailableScreen::create()
 {
@@ -30,4 +31,4 @@ void UnavailableScreen::loadView()
     setView(placeholder);
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -7,10 +7,10 @@
 
 #include <memory>
 
-namespace platform::components {
+namespace screens {
 
 /// What is shown while the drive cannot be used because nobody is signed in: what happened and what to do.
-class UnavailableScreen : public ui::ViewController {
+class UnavailableScreen : public kit::ViewController {
 public:
     static std::shared_ptr<UnavailableScreen> create();
 
@@ -18,4 +18,4 @@ public:
     void loadView() override;
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -11,19 +11,19 @@
 
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
-using ui::AlertAction;
-using ui::AlertActionStyle;
+using kit::AlertAction;
+using kit::AlertActionStyle;
 
-std::shared_ptr<ui::AlertController> makeAlert(const std::string& title, const std::string& message)
+std::shared_ptr<kit::AlertController> makeAlert(const std::string& title, const std::string& message)
 {
-    return std::make_shared<ui::AlertController>(title, message, ui::AlertStyle::Alert);
+    return std::make_shared<kit::AlertController>(title, message, kit::AlertStyle::Alert);
 }
 
-void showFailure(const std::shared_ptr<ui::ViewController>& presenter, const Error& error)
+void showFailure(const std::shared_ptr<kit::ViewController>& presenter, const Error& error)
 {
     const auto alert = makeAlert(localized("The page cannot be opened"), errorWords(error));
     alert->addAction(std::make_shared<AlertAction>(localized("OK"), AlertActionStyle::Cancel));
@@ -37,7 +37,7 @@ std::shared_ptr<UpgradeFlow> UpgradeFlow::initWithOffer(std::shared_ptr<const St
     return std::make_shared<UpgradeFlow>(std::move(offer));
 }
 
-void UpgradeFlow::beginWithPresentingViewController(const std::shared_ptr<ui::ViewController>& presenter)
+void UpgradeFlow::beginWithPresentingViewController(const std::shared_ptr<kit::ViewController>& presenter)
 {
     if (!_offer || !presenter)
         return;
@@ -55,7 +55,7 @@ void UpgradeFlow::beginWithPresentingViewController(const std::shared_ptr<ui::Vi
     presenter->presentViewController(alert, true);
 }
 
-void UpgradeFlow::openPage(const std::shared_ptr<ui::ViewController>& presenter)
+void UpgradeFlow::openPage(const std::shared_ptr<kit::ViewController>& presenter)
 {
     services().linkOpener().openLink(
         _offer->link.target, [weak = std::weak_ptr(presenter)](const std::optional<Error>& error) {
@@ -65,4 +65,4 @@ void UpgradeFlow::openPage(const std::shared_ptr<ui::ViewController>& presenter)
         });
 }
 
-} // namespace platform::components
+} // namespace screens

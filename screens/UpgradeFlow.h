@@ -4,14 +4,15 @@
 #pragma once
 
 #include "platform/StorageOffers.h"
+#include "screens/PlatformNames.h"
 
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 class ViewController;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 /// Leads from a storage offer to the page where it can be taken up. Main thread only.
 class UpgradeFlow : public std::enable_shared_from_this<UpgradeFlow> {
@@ -25,12 +26,12 @@ public:
     }
 
     /// Shows the offer over a screen. Whoever began the flow keeps it until the offer is dismissed.
-    void beginWithPresentingViewController(const std::shared_ptr<ui::ViewController>& presenter);
+    void beginWithPresentingViewController(const std::shared_ptr<kit::ViewController>& presenter);
 
 private:
-    void openPage(const std::shared_ptr<ui::ViewController>& presenter);
+    void openPage(const std::shared_ptr<kit::ViewController>& presenter);
 
     std::shared_ptr<const StorageOffer> _offer;
 };
 
-} // namespace platform::components
+} // namespace screens

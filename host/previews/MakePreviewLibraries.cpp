@@ -12,8 +12,6 @@
 namespace host::previews {
 
 namespace {
-
-namespace components = platform::components;
 using gtk::PreviewNative;
 
 class Libraries : public gtk::PreviewLibraries {
@@ -26,12 +24,12 @@ public:
         return previews::readPrintablePdf(path);
     }
     std::shared_ptr<PreviewNative> makeTextNative(
-        const std::shared_ptr<components::PreviewTextView>& view) const override
+        const std::shared_ptr<screens::PreviewTextView>& view) const override
     {
         return std::make_shared<TextNative>(view);
     }
     std::shared_ptr<PreviewNative> makeMediaNative(
-        const std::shared_ptr<components::PreviewMediaView>& view) const override
+        const std::shared_ptr<screens::PreviewMediaView>& view) const override
     {
         return std::make_shared<MediaNative>(view);
     }

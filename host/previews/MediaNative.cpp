@@ -12,7 +12,7 @@ namespace host::previews {
 
 using gtk::connectNotify;
 using gtk::ObjectRef;
-using platform::components::PreviewMediaView;
+using screens::PreviewMediaView;
 
 namespace {
 

@@ -11,7 +11,7 @@ namespace host::previews {
 /// Plays sound and films in the toolkit's player.
 class MediaNative : public gtk::PreviewNative {
 public:
-    explicit MediaNative(const std::shared_ptr<platform::components::PreviewMediaView>& view);
+    explicit MediaNative(const std::shared_ptr<screens::PreviewMediaView>& view);
     ~MediaNative() override;
 
     GtkWidget* widget() const override { return _box.get(); }
@@ -26,10 +26,10 @@ private:
     void open();
     void close();
     void showFilm();
-    void showSound(const platform::components::PreviewMediaView::Content& media);
+    void showSound(const screens::PreviewMediaView::Content& media);
     void checkError();
 
-    std::weak_ptr<platform::components::PreviewMediaView> _view;
+    std::weak_ptr<screens::PreviewMediaView> _view;
     gtk::ObjectRef<GtkWidget> _box;
     gtk::ObjectRef<GtkMediaStream> _stream;
     GtkWidget* _player = nullptr; ///< in the box

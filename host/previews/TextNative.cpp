@@ -17,9 +17,9 @@ using gtk::connectNotify;
 using gtk::connectSignal;
 using gtk::ObjectRef;
 using gtk::PreviewNative;
-using platform::components::MatchStep;
-using platform::components::PreviewTextView;
-using platform::components::PreviewView;
+using screens::MatchStep;
+using screens::PreviewTextView;
+using screens::PreviewView;
 
 namespace {
 

@@ -16,7 +16,7 @@ namespace host::previews {
 /// piece by piece; of a text that has changed, only the part that differs.
 class TextNative : public gtk::PreviewNative {
 public:
-    explicit TextNative(const std::shared_ptr<platform::components::PreviewTextView>& view);
+    explicit TextNative(const std::shared_ptr<screens::PreviewTextView>& view);
     ~TextNative() override;
 
     GtkWidget* widget() const override { return _window.get(); }
@@ -26,7 +26,7 @@ public:
     void previewContentDidChange() override;
     void previewZoomDidChange() override;
     void previewQueryDidChange() override;
-    void previewShouldShowMatch(platform::components::MatchStep step) override;
+    void previewShouldShowMatch(screens::MatchStep step) override;
     void previewShouldTakeFocus() override;
 
 private:
@@ -38,13 +38,13 @@ private:
     void finishText();
     void followTheme();
     void findLanguage();
-    void searchFrom(const GtkTextIter& place, platform::components::MatchStep step);
-    void matched(GAsyncResult* result, platform::components::MatchStep step);
+    void searchFrom(const GtkTextIter& place, screens::MatchStep step);
+    void matched(GAsyncResult* result, screens::MatchStep step);
     void publishSearch();
     void markMatch(const GtkTextIter& start, const GtkTextIter& end);
     void unmarkMatch();
 
-    std::weak_ptr<platform::components::PreviewTextView> _view;
+    std::weak_ptr<screens::PreviewTextView> _view;
     gtk::ObjectRef<GtkWidget> _window;
     gtk::ObjectRef<GtkSourceBuffer> _buffer;
     gtk::ObjectRef<GtkSourceSearchContext> _search;

@@ -3,7 +3,7 @@
 
 #include "kit/controllers/AlertAction.h"
 
-namespace platform::ui {
+namespace kit {
 
 AlertAction::AlertAction(std::string title, AlertActionStyle style, Handler handler)
     : _title(std::move(title))
@@ -27,4 +27,4 @@ void AlertAction::run()
         handler(shared_from_this());
 }
 
-} // namespace platform::ui
+} // namespace kit

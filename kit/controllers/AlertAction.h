@@ -7,7 +7,7 @@
 #include <memory>
 #include <string>
 
-namespace platform::ui {
+namespace kit {
 
 enum class AlertActionStyle { Default, Cancel, Destructive };
 
@@ -41,4 +41,4 @@ private:
     bool _enabled = true;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -8,7 +8,7 @@
 
 #include <algorithm>
 
-namespace platform::ui {
+namespace kit {
 
 AlertController::AlertController(std::string title, std::string message, AlertStyle style)
     : _alertStyle(style)
@@ -147,4 +147,4 @@ void AlertController::userCancelled()
         press(action);
 }
 
-} // namespace platform::ui
+} // namespace kit

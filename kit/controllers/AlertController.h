@@ -6,7 +6,7 @@
 #include "kit/controllers/AlertAction.h"
 #include "kit/controllers/ViewController.h"
 
-namespace platform::ui {
+namespace kit {
 
 class AlertController;
 class TextField;
@@ -73,4 +73,4 @@ private:
     bool _isClosing = false;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include "kit/views/View.h"
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -121,4 +121,4 @@ bool BarButtonItem::press()
     return action != nullptr;
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -4,6 +4,7 @@
 #pragma once
 
 #include "kit/values/ObserverSlot.h"
+#include "kit/values/PlatformNames.h"
 #include "platform/Image.h"
 
 #include <functional>
@@ -12,7 +13,7 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 class BarButtonItem;
 class View;
@@ -78,4 +79,4 @@ private:
 
 using BarButtonItems = std::vector<std::shared_ptr<BarButtonItem>>;
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include "kit/controllers/ViewController.h"
 
-namespace platform::ui {
+namespace kit {
 
 PropertyDictionary encodeInterfaceState(ViewController& root)
 {
@@ -32,4 +32,4 @@ void decodeInterfaceState(ViewController& root, const PropertyDictionary& state)
         decodeInterfaceState(*child, state);
 }
 
-} // namespace platform::ui
+} // namespace kit

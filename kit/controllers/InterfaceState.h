@@ -3,9 +3,10 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "platform/PropertyValue.h"
 
-namespace platform::ui {
+namespace kit {
 
 class ViewController;
 
@@ -15,4 +16,4 @@ PropertyDictionary encodeInterfaceState(ViewController& root);
 /// Screens without a kept state are not called.
 void decodeInterfaceState(ViewController& root, const PropertyDictionary& state);
 
-} // namespace platform::ui
+} // namespace kit

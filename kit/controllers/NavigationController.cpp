@@ -10,7 +10,7 @@
 #include <algorithm>
 #include <utility>
 
-namespace platform::ui {
+namespace kit {
 
 void NavigationController::accept(ViewControllerVisitor& visitor)
 {
@@ -273,4 +273,4 @@ void NavigationController::viewDidAppear(bool animated)
         tellDidShow(top, animated);
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -6,9 +6,10 @@
 #include "kit/controllers/NavigationControllerDelegate.h"
 #include "kit/controllers/NavigationObserver.h"
 #include "kit/controllers/ViewController.h"
+#include "kit/values/PlatformNames.h"
 #include "platform/Geometry.h"
 
-namespace platform::ui {
+namespace kit {
 
 /// How much of a screen lies under the bars. Both are zero where the host keeps screens between the bars.
 struct BarFrames {
@@ -85,4 +86,4 @@ private:
     bool _toolbarHidden = true, _hostSizesScreens = false;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 
 class NavigationController;
 class ViewController;
@@ -26,4 +26,4 @@ public:
     }
 };
 
-} // namespace platform::ui
+} // namespace kit

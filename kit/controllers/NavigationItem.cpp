@@ -3,7 +3,7 @@
 
 #include "kit/controllers/NavigationItem.h"
 
-namespace platform::ui {
+namespace kit {
 
 NavigationItem::NavigationItem(std::function<void()> onChange)
     : _onChange(std::move(onChange))
@@ -73,4 +73,4 @@ void NavigationItem::setMenu(std::string name, MenuMaker menu)
     _onChange();
 }
 
-} // namespace platform::ui
+} // namespace kit

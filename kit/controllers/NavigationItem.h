@@ -8,7 +8,7 @@
 
 #include <functional>
 
-namespace platform::ui {
+namespace kit {
 
 /// What a screen shows in the navigation bar while it is on top.
 class NavigationItem {
@@ -61,4 +61,4 @@ private:
     MenuMaker _menu;
 };
 
-} // namespace platform::ui
+} // namespace kit

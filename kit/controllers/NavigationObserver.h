@@ -7,7 +7,7 @@
 
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 
 class NavigationController;
 class ViewController;
@@ -36,4 +36,4 @@ public:
     virtual void toolbarVisibilityDidChange(NavigationController& controller, bool animated) = 0;
 };
 
-} // namespace platform::ui
+} // namespace kit

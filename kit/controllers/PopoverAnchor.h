@@ -3,13 +3,14 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "platform/Geometry.h"
 
 #include <cstdint>
 #include <memory>
 #include <variant>
 
-namespace platform::ui {
+namespace kit {
 
 class BarButtonItem;
 class View;
@@ -34,4 +35,4 @@ struct ViewAnchor {
 /// What a popover points at: nothing, a rectangle of a view, or an entry of a bar.
 using PopoverAnchor = std::variant<std::monostate, ViewAnchor, std::weak_ptr<BarButtonItem>>;
 
-} // namespace platform::ui
+} // namespace kit

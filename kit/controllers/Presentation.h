@@ -5,7 +5,7 @@
 
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 
 class ViewController;
 
@@ -20,4 +20,4 @@ struct Presentation {
     bool animated = false;
 };
 
-} // namespace platform::ui
+} // namespace kit

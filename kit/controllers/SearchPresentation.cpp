@@ -5,7 +5,7 @@
 
 #include "kit/controllers/ViewControllerVisitor.h"
 
-namespace platform::ui {
+namespace kit {
 
 SearchPresentation::SearchPresentation()
 {
@@ -69,4 +69,4 @@ void SearchPresentation::viewDidDisappear(bool animated)
         told->searchDidDisappear(*this);
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include "kit/controllers/ViewController.h"
 
-namespace platform::ui {
+namespace kit {
 
 class SearchPresentation;
 
@@ -68,4 +68,4 @@ private:
     bool _focus = false;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -8,7 +8,7 @@
 
 #include <utility>
 
-namespace platform::ui {
+namespace kit {
 
 /// The outermost screen around this one: what it presents lies over all of it.
 std::shared_ptr<ViewController> ViewController::presentationRoot() const
@@ -89,4 +89,4 @@ void ViewController::userCancelled()
     dismissViewController(true);
 }
 
-} // namespace platform::ui
+} // namespace kit

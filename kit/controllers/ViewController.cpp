@@ -12,7 +12,7 @@
 
 #include <algorithm>
 
-namespace platform::ui {
+namespace kit {
 
 ViewController::ViewController()
     : _navigationItem(std::make_unique<NavigationItem>([this] { barsChanged(); }))
@@ -183,4 +183,4 @@ bool ViewController::backRequested()
     return false;
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -8,6 +8,7 @@
 #include "kit/controllers/Presentation.h"
 #include "kit/controllers/ViewControllerObserver.h"
 #include "kit/values/ObserverSlot.h"
+#include "kit/values/PlatformNames.h"
 #include "kit/values/TraitCollection.h"
 #include "kit/views/ViewOwner.h"
 #include "platform/Geometry.h"
@@ -18,7 +19,7 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 class NavigationController;
 class NavigationItem;
@@ -140,4 +141,4 @@ private:
     ObserverSlot<ViewControllerObserver> _observer;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,7 +3,7 @@
 
 #pragma once
 
-namespace platform::ui {
+namespace kit {
 
 class ViewController;
 
@@ -15,4 +15,4 @@ public:
     virtual void barsDidChange(ViewController& controller) = 0;
 };
 
-} // namespace platform::ui
+} // namespace kit

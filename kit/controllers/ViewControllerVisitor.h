@@ -3,7 +3,7 @@
 
 #pragma once
 
-namespace platform::ui {
+namespace kit {
 
 class AlertController;
 class NavigationController;
@@ -21,4 +21,4 @@ public:
     virtual void visit(SearchPresentation& controller) = 0;
 };
 
-} // namespace platform::ui
+} // namespace kit

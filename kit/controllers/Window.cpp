@@ -10,7 +10,7 @@
 
 #include <utility>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -222,4 +222,4 @@ void Window::dismissOne(const Presentation& presentation, std::function<void()> 
         token.finish();
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -6,6 +6,7 @@
 #include "kit/controllers/Presentation.h"
 #include "kit/controllers/WindowObserver.h"
 #include "kit/values/ObserverSlot.h"
+#include "kit/values/PlatformNames.h"
 #include "kit/values/Screen.h"
 #include "kit/values/TraitCollection.h"
 #include "platform/Color.h"
@@ -16,7 +17,7 @@
 #include <optional>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 class ViewController;
 
@@ -79,4 +80,4 @@ private:
     bool _visible = false, _key = false;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,7 +3,7 @@
 
 #include "kit/controllers/WindowHost.h"
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -25,4 +25,4 @@ void WindowHost::install(std::shared_ptr<WindowHost> host)
     installedHost() = std::move(host);
 }
 
-} // namespace platform::ui
+} // namespace kit

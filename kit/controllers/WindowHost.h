@@ -5,7 +5,7 @@
 
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 
 class Window;
 
@@ -21,4 +21,4 @@ public:
     static void install(std::shared_ptr<WindowHost> host); ///< null: none
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -6,7 +6,7 @@
 #include "kit/controllers/Presentation.h"
 #include "kit/values/TransitionToken.h"
 
-namespace platform::ui {
+namespace kit {
 
 class Window;
 
@@ -24,4 +24,4 @@ public:
         Window& window, const Presentation& presentation, TransitionToken token) = 0;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include "kit/layout/LayoutConstraint.h"
 
-namespace platform::ui {
+namespace kit {
 
 LayoutAnchor::LayoutAnchor(std::weak_ptr<LayoutItem> item, LayoutAttribute attribute)
     : _item(std::move(item))
@@ -47,4 +47,4 @@ LayoutAnchor::Made LayoutAnchor::greaterThanOrEqualToConstant(double constant) c
     return greaterThanOrEqualTo({}, constant);
 }
 
-} // namespace platform::ui
+} // namespace kit

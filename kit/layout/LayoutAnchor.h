@@ -5,7 +5,7 @@
 
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 
 class LayoutConstraint;
 class LayoutItem;
@@ -67,4 +67,4 @@ private:
     LayoutAttribute _attribute = LayoutAttribute::None;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -4,13 +4,14 @@
 #include "kit/layout/LayoutConstraint.h"
 
 #include "kit/layout/LayoutItem.h"
+#include "kit/values/PlatformNames.h"
 #include "platform/Log.h"
 
 #include <algorithm>
 #include <array>
 #include <sstream>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -112,4 +113,4 @@ void LayoutConstraint::deactivate(const LayoutConstraints& constraints)
         constraint->setActive(false);
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -9,7 +9,7 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 /// The relation: first = second * multiplier + constant (or <=, or >=). An active constraint is kept alive by
 /// the view of its first anchor and takes part in the layout while both views stand in one tree; it ends with
@@ -59,4 +59,4 @@ private:
 
 using LayoutConstraints = std::vector<std::shared_ptr<LayoutConstraint>>;
 
-} // namespace platform::ui
+} // namespace kit

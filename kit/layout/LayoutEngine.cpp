@@ -11,7 +11,7 @@
 #include <cmath>
 #include <utility>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -462,4 +462,4 @@ Size LayoutEngine::fittingSize(Size target)
     return {_impl->solver.value(own.width), _impl->solver.value(own.height)};
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,11 +3,12 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "platform/Geometry.h"
 
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 
 class LayoutConstraint;
 class LayoutItem;
@@ -38,4 +39,4 @@ private:
     std::unique_ptr<Impl> _impl;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -9,7 +9,7 @@
 #include <algorithm>
 #include <cmath>
 
-namespace platform::ui {
+namespace kit {
 
 LayoutItem::LayoutItem() = default;
 
@@ -187,4 +187,4 @@ void LayoutItem::setNeedsUpdateConstraints()
     layoutInputDidChange();
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -4,6 +4,7 @@
 #pragma once
 
 #include "kit/layout/LayoutConstraint.h"
+#include "kit/values/PlatformNames.h"
 #include "platform/Geometry.h"
 
 #include <array>
@@ -11,7 +12,7 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 class LayoutEngine;
 
@@ -141,4 +142,4 @@ private:
     bool _needsLayout = true, _treeNeedsLayout = true, _layoutBoundary = false;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -8,7 +8,7 @@
 #include <algorithm>
 #include <utility>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -285,4 +285,4 @@ double LayoutSolver::value(Variable variable) const
     return _impl->tableau.value(*_impl->variables[variable]);
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -11,7 +11,7 @@
 #include <span>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 /// Solves systems of linear equations and inequalities over real numbers, incrementally, by the Cassowary
 /// method (a simplex tableau that is kept solved). Constraints that are not required may be missed; what is
@@ -61,4 +61,4 @@ private:
     std::unique_ptr<Impl> _impl;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include <algorithm>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -160,4 +160,4 @@ void LayoutTranslation::addLength(LayoutRule& rule, const LayoutItem& item, Axis
     _framesUsed.insert(&item);
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -11,7 +11,7 @@
 #include <unordered_set>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 /// The place and size of a item in the solver; the origin is in the parent's coordinates.
 struct LayoutVariables {
@@ -59,4 +59,4 @@ private:
     std::unordered_set<const LayoutItem*> _framesUsed;
 };
 
-} // namespace platform::ui
+} // namespace kit

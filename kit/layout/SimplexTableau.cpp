@@ -6,7 +6,7 @@
 #include <algorithm>
 #include <limits>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -395,4 +395,4 @@ bool SimplexTableau::costsLess(Column a, double scaleA, Column b, double scaleB)
     return false;
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -10,7 +10,7 @@
 #include <map>
 #include <optional>
 
-namespace platform::ui {
+namespace kit {
 
 /// A simplex tableau in basic feasible form with one objective for each priority; the objectives are
 /// minimised in the order of the priorities. The solver's engine room: it knows columns, not constraints.
@@ -103,4 +103,4 @@ private:
     std::uint64_t _stamp = 0;
 };
 
-} // namespace platform::ui
+} // namespace kit

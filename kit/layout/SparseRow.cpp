@@ -5,7 +5,7 @@
 
 #include <algorithm>
 
-namespace platform::ui {
+namespace kit {
 
 std::vector<SparseRow::Cell>::iterator SparseRow::find(Column column)
 {
@@ -60,4 +60,4 @@ void SparseRow::solveFor(Column from, Column to)
     solveFor(to);
 }
 
-} // namespace platform::ui
+} // namespace kit

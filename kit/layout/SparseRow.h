@@ -7,7 +7,7 @@
 #include <cstdint>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 /// A linear expression of few of many columns: constant + sum of coefficient * column.
 class SparseRow {
@@ -69,4 +69,4 @@ void SparseRow::addScaled(const SparseRow& other, double factor, OnNew&& onNew)
     _cells.assign(merged.begin(), merged.end());
 }
 
-} // namespace platform::ui
+} // namespace kit

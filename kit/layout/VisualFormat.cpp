@@ -4,12 +4,13 @@
 #include "kit/layout/VisualFormat.h"
 
 #include "kit/layout/LayoutItem.h"
+#include "kit/values/PlatformNames.h"
 #include "platform/Log.h"
 
 #include <cctype>
 #include <charconv>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -290,4 +291,4 @@ LayoutConstraints VisualFormat::constraints(std::string_view format, const Visua
     return std::move(result.constraints);
 }
 
-} // namespace platform::ui
+} // namespace kit

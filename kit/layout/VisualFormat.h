@@ -12,7 +12,7 @@
 #include <string>
 #include <string_view>
 
-namespace platform::ui {
+namespace kit {
 
 /// What a visual format is read with.
 struct VisualFormatInput {
@@ -48,4 +48,4 @@ LayoutConstraints constraints(std::string_view format, const VisualFormatInput& 
 
 } // namespace VisualFormat
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include <utility>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -33,4 +33,4 @@ const AnimationOptions* currentAnimation()
     return runningAnimation();
 }
 
-} // namespace platform::ui
+} // namespace kit

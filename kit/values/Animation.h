@@ -5,7 +5,7 @@
 
 #include <functional>
 
-namespace platform::ui {
+namespace kit {
 
 /// The platform's curves, with the numbers that keyboard notices carry.
 enum class AnimationCurve { EaseInOut = 0, EaseIn = 1, EaseOut = 2, Linear = 3 };
@@ -27,4 +27,4 @@ void animate(const AnimationOptions& options, const std::function<void()>& chang
 /// Null outside of `animate`.
 const AnimationOptions* currentAnimation();
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,7 +3,7 @@
 
 #include "kit/values/AttributedText.h"
 
-namespace platform::ui {
+namespace kit {
 
 AttributedText::AttributedText(std::string text, TextAttributes attributes)
 {
@@ -29,4 +29,4 @@ std::string AttributedText::plainText() const
     return text;
 }
 
-} // namespace platform::ui
+} // namespace kit

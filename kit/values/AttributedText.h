@@ -4,6 +4,7 @@
 #pragma once
 
 #include "kit/values/Font.h"
+#include "kit/values/PlatformNames.h"
 #include "platform/Color.h"
 #include "platform/Image.h"
 
@@ -11,7 +12,7 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 /// How one piece of a styled text is set; what is absent comes from the label that shows it.
 struct TextAttributes {
@@ -51,4 +52,4 @@ private:
     std::vector<TextRun> _runs;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -4,13 +4,14 @@
 #pragma once
 
 #include "kit/values/Font.h"
+#include "kit/values/PlatformNames.h"
 #include "platform/Color.h"
 #include "platform/Geometry.h"
 #include "platform/Image.h"
 
 #include <string_view>
 
-namespace platform::ui {
+namespace kit {
 
 /// A slice of a disc. Angles are radians, 0 at three o'clock, growing clockwise on the screen.
 struct Pie {
@@ -40,4 +41,4 @@ public:
     virtual void drawText(std::string_view text, const Font& font, Point origin) = 0;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -7,7 +7,7 @@
 
 #include <array>
 
-namespace platform::ui {
+namespace kit {
 
 Font Font::preferred(TextStyle style)
 {
@@ -43,4 +43,4 @@ FontMetrics Font::metrics() const
     return TextMeasurer::current().metrics(*this);
 }
 
-} // namespace platform::ui
+} // namespace kit

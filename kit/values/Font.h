@@ -3,7 +3,7 @@
 
 #pragma once
 
-namespace platform::ui {
+namespace kit {
 
 enum class TextStyle {
     LargeTitle,
@@ -50,4 +50,4 @@ struct Font {
     bool operator==(const Font&) const = default;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include <array>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -55,4 +55,4 @@ PropertyDictionary KeyboardNotice::toUserInfo() const
         {"animationCurve", animationCurve}};
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,10 +3,11 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "platform/Geometry.h"
 #include "platform/PropertyValue.h"
 
-namespace platform::ui {
+namespace kit {
 
 /// What a keyboard notice says: the area that the on-screen keyboard covers, in the window's coordinates, and
 /// how it moves there.
@@ -25,4 +26,4 @@ struct KeyboardNotice {
     bool operator==(const KeyboardNotice&) const = default;
 };
 
-} // namespace platform::ui
+} // namespace kit

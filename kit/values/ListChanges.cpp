@@ -7,7 +7,7 @@
 #include <limits>
 #include <unordered_map>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -115,4 +115,4 @@ ListChanges ListChanges::between(std::span<const RowId> before, std::span<const 
     return changes;
 }
 
-} // namespace platform::ui
+} // namespace kit

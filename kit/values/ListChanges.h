@@ -9,7 +9,7 @@
 #include <span>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 /// Rows from `first` on, `count` of them.
 struct RowRange {
@@ -45,4 +45,4 @@ struct ListChanges {
     static ListChanges between(std::span<const RowId> before, std::span<const RowId> after);
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "platform/Color.h"
 #include "platform/Image.h"
 
@@ -11,7 +12,7 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 /// Names a row for as long as its list lives, wherever it stands.
 using RowId = std::uint64_t;
@@ -39,4 +40,4 @@ struct ListRow {
     bool operator==(const ListRow&) const = default;
 };
 
-} // namespace platform::ui
+} // namespace kit

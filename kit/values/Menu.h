@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "platform/Image.h"
 
 #include <functional>
@@ -10,7 +11,7 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 enum class MenuActionStyle { Default, Destructive };
 
@@ -30,4 +31,4 @@ struct MenuAction {
 
 using Menu = std::vector<MenuAction>;
 
-} // namespace platform::ui
+} // namespace kit

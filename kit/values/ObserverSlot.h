@@ -6,7 +6,7 @@
 #include <memory>
 #include <utility>
 
-namespace platform::ui {
+namespace kit {
 
 /// The place where a kit object keeps the peer that mirrors it: weak, so that a destroyed peer is never
 /// called. Main thread only.
@@ -27,4 +27,4 @@ private:
     std::weak_ptr<Observer> _observer;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -7,7 +7,7 @@
 #include <bit>
 #include <utility>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -97,4 +97,4 @@ bool RowIdSet::operator==(const RowIdSet& other) const
         && std::ranges::all_of(_places, [&](RowId id) { return id == emptyMark || other.contains(id); });
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -9,7 +9,7 @@
 #include <span>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 /// A set of row identifiers in one block of memory: 100,000 of them go in within a millisecond or two, which
 /// a set of nodes takes twenty for. A value.
@@ -39,4 +39,4 @@ private:
     bool _hasEmptyMark = false;
 };
 
-} // namespace platform::ui
+} // namespace kit

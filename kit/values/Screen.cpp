@@ -3,7 +3,7 @@
 
 #include "kit/values/Screen.h"
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -30,4 +30,4 @@ double Screen::mainScale()
     return mainScreen() ? mainScreen()->scale : 1;
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,11 +3,12 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "platform/Geometry.h"
 
 #include <optional>
 
-namespace platform::ui {
+namespace kit {
 
 enum class UserInterfaceIdiom { Phone, Tablet };
 
@@ -36,4 +37,4 @@ struct Screen {
     bool operator==(const Screen&) const = default;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include <algorithm>
 
-namespace platform::ui {
+namespace kit {
 
 void SelectionModel::touch(RowId id)
 {
@@ -98,4 +98,4 @@ std::vector<RowId> SelectionModel::inOrder(std::span<const RowId> order) const
     return selected;
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -10,7 +10,7 @@
 #include <span>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 /// Which rows are selected, by identifier, so that a selection outlives every change of order. A value that
 /// knows no list and no widget.
@@ -52,4 +52,4 @@ private:
     std::optional<Range> _range;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,9 +3,10 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "platform/Color.h"
 
-namespace platform::ui {
+namespace kit {
 
 /// The platform's standard colours in light surroundings. A host shows these, a white background and black
 /// content in its theme's colours for the same purpose, so that they follow dark and high-contrast
@@ -21,4 +22,4 @@ inline constexpr Color hairline = Color::gray(0, 0.3F); ///< the line under a na
 
 } // namespace StandardColors
 
-} // namespace platform::ui
+} // namespace kit

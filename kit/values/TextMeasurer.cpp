@@ -6,7 +6,7 @@
 #include <algorithm>
 #include <cmath>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -120,4 +120,4 @@ void TextMeasurer::install(std::shared_ptr<const TextMeasurer> measurer)
     installedMeasurer() = measurer ? std::move(measurer) : std::make_shared<PlainMeasurer>();
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,12 +5,13 @@
 
 #include "kit/values/AttributedText.h"
 #include "kit/values/Font.h"
+#include "kit/values/PlatformNames.h"
 #include "platform/Geometry.h"
 
 #include <memory>
 #include <string_view>
 
-namespace platform::ui {
+namespace kit {
 
 /// The room that a text may take.
 struct TextLimits {
@@ -37,4 +38,4 @@ public:
     static void install(std::shared_ptr<const TextMeasurer> measurer);
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,7 +3,7 @@
 
 #include "kit/values/TraitCollection.h"
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -25,4 +25,4 @@ void TraitCollection::setApplication(const TraitCollection& traits)
     applicationTraits() = traits;
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,7 +3,7 @@
 
 #pragma once
 
-namespace platform::ui {
+namespace kit {
 
 enum class SizeClass { Compact, Regular };
 enum class LayoutDirection { LeftToRight, RightToLeft };
@@ -25,4 +25,4 @@ struct TraitCollection {
     bool operator==(const TraitCollection&) const = default;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include <utility>
 
-namespace platform::ui {
+namespace kit {
 
 void TransitionCoordinator::animateAlongside(
     std::function<void()> alongside, std::function<void()> completion)
@@ -24,4 +24,4 @@ void TransitionCoordinator::run()
         call();
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -8,7 +8,7 @@
 #include <functional>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 /// Handed to a screen that is about to change its size: collects what changes along with it.
 class TransitionCoordinator {
@@ -23,4 +23,4 @@ private:
     std::vector<std::function<void()>> _alongside, _completions;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include <utility>
 
-namespace platform::ui {
+namespace kit {
 
 struct TransitionToken::State {
     std::function<void()> atEnd;
@@ -35,4 +35,4 @@ bool TransitionToken::isFinished() const
     return !_state || !_state->atEnd;
 }
 
-} // namespace platform::ui
+} // namespace kit

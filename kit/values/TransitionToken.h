@@ -6,7 +6,7 @@
 #include <functional>
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 
 /// What a peer holds while it shows a transition. The model has changed already; what has to wait for the end
 /// of the movement runs once, when `finish()` is called or when the last copy of the token is destroyed, so
@@ -26,4 +26,4 @@ private:
     std::shared_ptr<State> _state;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,7 +3,7 @@
 
 #include "kit/values/TypeAhead.h"
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -46,4 +46,4 @@ std::size_t TypeAhead::start(std::size_t focused) const
     return isRepeated() ? focused + 1 : focused;
 }
 
-} // namespace platform::ui
+} // namespace kit

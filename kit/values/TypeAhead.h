@@ -3,13 +3,14 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "platform/Date.h"
 
 #include <cstddef>
 #include <string>
 #include <string_view>
 
-namespace platform::ui {
+namespace kit {
 
 /// What is typed in quick succession to find a row by the beginning of its name. A value.
 class TypeAhead {
@@ -36,4 +37,4 @@ private:
     Date _last{};
 };
 
-} // namespace platform::ui
+} // namespace kit

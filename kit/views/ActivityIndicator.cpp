@@ -5,7 +5,7 @@
 
 #include "kit/views/ViewVisitor.h"
 
-namespace platform::ui {
+namespace kit {
 
 void ActivityIndicator::accept(ViewVisitor& visitor)
 {
@@ -33,4 +33,4 @@ Size ActivityIndicator::intrinsicContentSize(double) const
     return {sideLength, sideLength};
 }
 
-} // namespace platform::ui
+} // namespace kit

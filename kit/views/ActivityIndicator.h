@@ -5,7 +5,7 @@
 
 #include "kit/views/View.h"
 
-namespace platform::ui {
+namespace kit {
 
 /// A spinner: something goes on and its end is not known.
 class ActivityIndicator : public View {
@@ -25,4 +25,4 @@ private:
     bool _animating = false;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -7,7 +7,7 @@
 
 #include <algorithm>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -134,4 +134,4 @@ void Button::placeTitle()
         roundToPixel((bounds().height - title.height) / 2), title.width, title.height});
 }
 
-} // namespace platform::ui
+} // namespace kit

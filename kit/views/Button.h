@@ -3,12 +3,13 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "kit/views/Label.h"
 #include "platform/Image.h"
 
 #include <functional>
 
-namespace platform::ui {
+namespace kit {
 
 enum class ButtonStyle { System, Suggested, Destructive };
 
@@ -53,4 +54,4 @@ private:
     std::function<void()> _action;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include <utility>
 
-namespace platform::ui {
+namespace kit {
 
 GestureRecognizer::GestureRecognizer(Handler handler)
     : _handler(std::move(handler))
@@ -27,4 +27,4 @@ void GestureRecognizer::recognized(Point point) const
         handler(point);
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,12 +3,13 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "platform/Geometry.h"
 
 #include <chrono>
 #include <functional>
 
-namespace platform::ui {
+namespace kit {
 
 /// Recognises one kind of touch on the view that it was added to. The peer feeds it with what one finger, or
 /// the first mouse button, does; points are in the view's coordinates, times count from any fixed moment.
@@ -37,4 +38,4 @@ private:
     bool _enabled = true;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include "kit/views/ViewVisitor.h"
 
-namespace platform::ui {
+namespace kit {
 
 HostedView::HostedView(std::string kind, PropertyDictionary settings)
     : _kind(std::move(kind))
@@ -32,4 +32,4 @@ void HostedView::reportEvent(const std::string& event, const PropertyValue& valu
         handler(event, value);
 }
 
-} // namespace platform::ui
+} // namespace kit

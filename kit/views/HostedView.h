@@ -3,12 +3,13 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "kit/views/View.h"
 #include "platform/PropertyValue.h"
 
 #include <functional>
 
-namespace platform::ui {
+namespace kit {
 
 /// A place for a native view that the host makes by its kind ("document", "video", ...), with settings that
 /// the host reads and events that it reports. Without a host it stays empty.
@@ -33,4 +34,4 @@ private:
     EventHandler _onEvent;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include "kit/views/ViewVisitor.h"
 
-namespace platform::ui {
+namespace kit {
 
 ImageView::ImageView(std::optional<Image> image)
     : _image(std::move(image))
@@ -47,4 +47,4 @@ Size ImageView::intrinsicContentSize(double) const
     return _image && !_image->isNamed() ? _image->size() : Size{noIntrinsicMetric, noIntrinsicMetric};
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,10 +3,11 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "kit/views/View.h"
 #include "platform/Image.h"
 
-namespace platform::ui {
+namespace kit {
 
 enum class ContentMode { ScaleToFill, AspectFit, Center };
 enum class ImageFilter { Smooth, Nearest };
@@ -34,4 +35,4 @@ private:
     ImageFilter _magnification = ImageFilter::Smooth;
 };
 
-} // namespace platform::ui
+} // namespace kit

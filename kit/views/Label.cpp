@@ -8,7 +8,7 @@
 
 #include <cmath>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -119,4 +119,4 @@ double Label::lastBaselineOffset() const
     return -_font.metrics().descender;
 }
 
-} // namespace platform::ui
+} // namespace kit

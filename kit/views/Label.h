@@ -6,7 +6,7 @@
 #include "kit/values/AttributedText.h"
 #include "kit/views/View.h"
 
-namespace platform::ui {
+namespace kit {
 
 enum class TextAlignment { Natural, Left, Center, Right };
 enum class LineBreak { WordWrap, TruncateTail, TruncateMiddle };
@@ -53,4 +53,4 @@ private:
     int _maxLines = 1;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -8,7 +8,7 @@
 #include <algorithm>
 #include <cmath>
 
-namespace platform::ui {
+namespace kit {
 
 void ListViewDelegate::refreshRequested(ListView& list)
 {
@@ -288,4 +288,4 @@ void ListView::updateVisibleRows(Tell tell)
         delegate->visibleRowsDidChange(*this, visible);
 }
 
-} // namespace platform::ui
+} // namespace kit

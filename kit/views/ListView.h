@@ -9,7 +9,7 @@
 #include "kit/views/ListViewObserver.h"
 #include "kit/views/ScrollView.h"
 
-namespace platform::ui {
+namespace kit {
 
 enum class SelectionMode { None, Multiple };
 
@@ -92,4 +92,4 @@ private:
     bool _refreshable = false, _refreshing = false;
 };
 
-} // namespace platform::ui
+} // namespace kit

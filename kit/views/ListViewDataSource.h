@@ -8,7 +8,7 @@
 #include <optional>
 #include <string_view>
 
-namespace platform::ui {
+namespace kit {
 
 class ListView;
 
@@ -34,4 +34,4 @@ public:
     }
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -8,7 +8,7 @@
 
 #include <cstddef>
 
-namespace platform::ui {
+namespace kit {
 
 class ListView;
 
@@ -46,4 +46,4 @@ public:
     virtual void heldRowPressedOn(ListView&) { }
 };
 
-} // namespace platform::ui
+} // namespace kit

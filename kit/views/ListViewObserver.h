@@ -5,7 +5,7 @@
 
 #include "kit/values/ListChanges.h"
 
-namespace platform::ui {
+namespace kit {
 
 class ListView;
 
@@ -29,4 +29,4 @@ public:
     virtual void refreshStateDidChange(ListView& list) = 0;
 };
 
-} // namespace platform::ui
+} // namespace kit

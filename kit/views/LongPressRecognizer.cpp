@@ -5,7 +5,7 @@
 
 #include <cmath>
 
-namespace platform::ui {
+namespace kit {
 
 void LongPressRecognizer::pressed(Point point, Time time)
 {
@@ -40,4 +40,4 @@ void LongPressRecognizer::cancelled()
     _press.reset();
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -7,7 +7,7 @@
 
 #include <optional>
 
-namespace platform::ui {
+namespace kit {
 
 /// A touch that rests. The handler is called once, while the finger is still down: at the first report,
 /// `held` or `moved`, that comes after the minimum duration.
@@ -33,4 +33,4 @@ private:
     std::optional<Press> _press;
 };
 
-} // namespace platform::ui
+} // namespace kit

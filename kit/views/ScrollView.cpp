@@ -7,7 +7,7 @@
 
 #include <algorithm>
 
-namespace platform::ui {
+namespace kit {
 
 void ScrollView::accept(ViewVisitor& visitor)
 {
@@ -75,4 +75,4 @@ void ScrollView::contentOffsetDidChange()
         callback();
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -7,7 +7,7 @@
 
 #include <functional>
 
-namespace platform::ui {
+namespace kit {
 
 class ScrollView;
 
@@ -70,4 +70,4 @@ private:
     std::function<void()> _onScroll;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -6,7 +6,7 @@
 #include <algorithm>
 #include <utility>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -195,4 +195,4 @@ void StackView::willRemoveSubview(View& view)
     removeArrangedSubview(view.shared_from_this());
 }
 
-} // namespace platform::ui
+} // namespace kit

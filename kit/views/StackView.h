@@ -5,7 +5,7 @@
 
 #include "kit/views/View.h"
 
-namespace platform::ui {
+namespace kit {
 
 enum class StackAlignment { Fill, Leading, Center, Trailing, FirstBaseline };
 enum class StackDistribution { Fill, FillEqually, FillProportionally };
@@ -48,4 +48,4 @@ private:
     double _spacing = 0;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,7 +5,7 @@
 
 #include <cmath>
 
-namespace platform::ui {
+namespace kit {
 
 void TapRecognizer::pressed(Point point, Time time)
 {
@@ -33,4 +33,4 @@ void TapRecognizer::cancelled()
     _press.reset();
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -7,7 +7,7 @@
 
 #include <optional>
 
-namespace platform::ui {
+namespace kit {
 
 /// A short touch that does not move. The handler is called once, when the finger is lifted.
 class TapRecognizer : public GestureRecognizer {
@@ -32,4 +32,4 @@ private:
     std::optional<Press> _press;
 };
 
-} // namespace platform::ui
+} // namespace kit

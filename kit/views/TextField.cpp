@@ -9,7 +9,7 @@
 #include <algorithm>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -223,4 +223,4 @@ double TextField::lastBaselineOffset() const
     return (std::max(frame().height, metrics.lineHeight) - metrics.lineHeight) / 2 - metrics.descender;
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -8,7 +8,7 @@
 
 #include <functional>
 
-namespace platform::ui {
+namespace kit {
 
 enum class ReturnKey { Default, Done, Search };
 enum class Capitalization { None, Words, Sentences };
@@ -80,4 +80,4 @@ private:
     bool _editing = false;
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -6,7 +6,7 @@
 #include <cstddef>
 #include <string>
 
-namespace platform::ui {
+namespace kit {
 
 class TextField;
 
@@ -38,4 +38,4 @@ public:
     }
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -7,7 +7,7 @@
 
 #include <algorithm>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -72,4 +72,4 @@ void View::sizeToFit()
     setFrame({_frame.x, _frame.y, intrinsicSide(size.width), intrinsicSide(size.height)});
 }
 
-} // namespace platform::ui
+} // namespace kit

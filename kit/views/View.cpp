@@ -8,7 +8,7 @@
 #include <algorithm>
 #include <cmath>
 
-namespace platform::ui {
+namespace kit {
 
 View::View(const Rect& frame)
     : _frame(frame)
@@ -257,4 +257,4 @@ void View::setBoundsOrigin(Point origin)
     changed(ViewChange::Bounds);
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -5,6 +5,7 @@
 
 #include "kit/layout/LayoutItem.h"
 #include "kit/values/ObserverSlot.h"
+#include "kit/values/PlatformNames.h"
 #include "kit/values/TraitCollection.h"
 #include "kit/views/ViewObserver.h"
 #include "platform/Color.h"
@@ -14,7 +15,7 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 
 class Canvas;
 class GestureRecognizer;
@@ -137,4 +138,4 @@ private:
     bool _hidden = false, _enabled = true;
 };
 
-} // namespace platform::ui
+} // namespace kit

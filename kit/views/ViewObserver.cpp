@@ -3,7 +3,7 @@
 
 #include "kit/views/ViewObserver.h"
 
-namespace platform::ui {
+namespace kit {
 
 void ViewObserver::viewWantsFocus(View&, bool) { }
 
@@ -12,4 +12,4 @@ std::optional<Size> ViewObserver::nativeSize(const View&, double)
     return std::nullopt;
 }
 
-} // namespace platform::ui
+} // namespace kit

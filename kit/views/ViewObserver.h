@@ -3,12 +3,13 @@
 
 #pragma once
 
+#include "kit/values/PlatformNames.h"
 #include "platform/Geometry.h"
 
 #include <cstdint>
 #include <optional>
 
-namespace platform::ui {
+namespace kit {
 
 class View;
 
@@ -75,4 +76,4 @@ public:
     virtual std::optional<Size> nativeSize(const View& view, double maxWidth);
 };
 
-} // namespace platform::ui
+} // namespace kit

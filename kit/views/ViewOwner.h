@@ -3,7 +3,7 @@
 
 #pragma once
 
-namespace platform::ui {
+namespace kit {
 
 /// Stands behind the root view of a screen, and is told whenever that view lays out its subviews.
 class ViewOwner {
@@ -14,4 +14,4 @@ public:
     virtual void viewDidLayoutSubviews() { } ///< after it has
 };
 
-} // namespace platform::ui
+} // namespace kit

@@ -3,7 +3,7 @@
 
 #pragma once
 
-namespace platform::ui {
+namespace kit {
 
 class ActivityIndicator;
 class Button;
@@ -32,4 +32,4 @@ public:
     virtual void visit(HostedView& hostedView) = 0;
 };
 
-} // namespace platform::ui
+} // namespace kit

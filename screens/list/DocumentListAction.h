@@ -3,7 +3,7 @@
 
 #pragma once
 
-namespace platform::components {
+namespace screens {
 
 /// What a folder list offers for one item, with the codes that it reports.
 enum class DocumentListAction : int {
@@ -24,4 +24,4 @@ constexpr DocumentListActionSet actionBit(DocumentListAction action)
     return 1U << static_cast<int>(action);
 }
 
-} // namespace platform::components
+} // namespace screens

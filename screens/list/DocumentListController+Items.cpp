@@ -17,24 +17,24 @@
 #include <algorithm>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
 struct ActionEntry {
     DocumentListAction action;
     const char* title;
-    ui::MenuActionStyle style;
+    kit::MenuActionStyle style;
     bool forLibraries; ///< whether an app library offers it
 };
 
 constexpr ActionEntry menuEntries[] = {
-    {DocumentListAction::Info, "Info", ui::MenuActionStyle::Default, true},
-    {DocumentListAction::Share, "Share", ui::MenuActionStyle::Default, true},
-    {DocumentListAction::Rename, "Rename", ui::MenuActionStyle::Default, false},
-    {DocumentListAction::Move, "Move", ui::MenuActionStyle::Default, false},
-    {DocumentListAction::More, "More", ui::MenuActionStyle::Default, true},
-    {DocumentListAction::Delete, "Delete", ui::MenuActionStyle::Destructive, true},
+    {DocumentListAction::Info, "Info", kit::MenuActionStyle::Default, true},
+    {DocumentListAction::Share, "Share", kit::MenuActionStyle::Default, true},
+    {DocumentListAction::Rename, "Rename", kit::MenuActionStyle::Default, false},
+    {DocumentListAction::Move, "Move", kit::MenuActionStyle::Default, false},
+    {DocumentListAction::More, "More", kit::MenuActionStyle::Default, true},
+    {DocumentListAction::Delete, "Delete", kit::MenuActionStyle::Destructive, true},
 };
 
 bool opensAsFolder(FolderEntryKind kind)
@@ -80,7 +80,7 @@ void DocumentListController::setSelectedItems(const std::vector<Url>& items)
 {
     if (!_editing || !_contents || !isViewLoaded())
         return;
-    ui::SelectionModel selection;
+    kit::SelectionModel selection;
     for (const auto& item : items)
         selection.select(_contents->rows()->idFor(item));
     _listView->setSelection(std::move(selection));
@@ -104,26 +104,26 @@ void DocumentListController::setEditingAnimated(bool editing, bool)
     if (isViewLoaded())
         offerSearch();
     if (isViewLoaded())
-        _listView->setSelectionMode(editing ? ui::SelectionMode::Multiple : ui::SelectionMode::None);
+        _listView->setSelectionMode(editing ? kit::SelectionMode::Multiple : kit::SelectionMode::None);
 }
 
-void DocumentListController::selectionDidChange(ui::ListView&)
+void DocumentListController::selectionDidChange(kit::ListView&)
 {
     if (const auto told = delegate())
         told->documentListControllerItemsChanged(self());
 }
 
-void DocumentListController::visibleRowsDidChange(ui::ListView&, ui::RowRange)
+void DocumentListController::visibleRowsDidChange(kit::ListView&, kit::RowRange)
 {
     _rows->visibleRowsDidChange();
 }
 
-void DocumentListController::refreshRequested(ui::ListView&)
+void DocumentListController::refreshRequested(kit::ListView&)
 {
     refresh();
 }
 
-void DocumentListController::rowActivated(ui::ListView&, std::size_t index)
+void DocumentListController::rowActivated(kit::ListView&, std::size_t index)
 {
     const auto rows = _rows->rows();
     if (rows && index < rows->count())
@@ -141,9 +141,9 @@ void DocumentListController::open(const Url& url, FolderEntryKind kind)
         told->documentListControllerDidSelectItemAtURL(self(), url);
 }
 
-ui::Menu DocumentListController::menuForRow(ui::ListView&, std::size_t index)
+kit::Menu DocumentListController::menuForRow(kit::ListView&, std::size_t index)
 {
-    ui::Menu menu;
+    kit::Menu menu;
     const auto rows = _rows->rows();
     if (_editing || !rows || index >= rows->count())
         return menu;
@@ -165,7 +165,7 @@ ui::Menu DocumentListController::menuForRow(ui::ListView&, std::size_t index)
     return menu;
 }
 
-ui::MenuAction DocumentListController::downloadEntry(const Url& url)
+kit::MenuAction DocumentListController::downloadEntry(const Url& url)
 {
     const bool isRunning = services().cloudDocumentService().items().downloadProgress(url).has_value();
     auto chosen = [weak = std::weak_ptr(self()), url, isRunning] {
@@ -187,10 +187,10 @@ void DocumentListController::download(const Url& url)
             const auto list = weak.lock();
             if (!list || !error || error->is(FileErrorCode::Cancelled))
                 return;
-            const auto alert = std::make_shared<ui::AlertController>(
-                localized("It could not be downloaded."), errorWords(*error), ui::AlertStyle::Alert);
+            const auto alert = std::make_shared<kit::AlertController>(
+                localized("It could not be downloaded."), errorWords(*error), kit::AlertStyle::Alert);
             alert->addAction(
-                std::make_shared<ui::AlertAction>(localized("OK"), ui::AlertActionStyle::Default));
+                std::make_shared<kit::AlertAction>(localized("OK"), kit::AlertActionStyle::Default));
             list->presentViewController(alert, true);
         });
 }
@@ -202,7 +202,7 @@ void DocumentListController::perform(DocumentListAction action, const Url& url)
             self(), static_cast<int>(action), url, anchorFor(url), {});
 }
 
-std::shared_ptr<ui::View> DocumentListController::anchorFor(const Url& url)
+std::shared_ptr<kit::View> DocumentListController::anchorFor(const Url& url)
 {
     const auto rows = _rows->rows();
     const auto [first, count] = _listView->visibleRows();
@@ -225,17 +225,17 @@ bool DocumentListController::offers(DocumentListAction action, FolderEntryKind k
     return isForKind && (_availableActions & actionBit(action)) != 0;
 }
 
-bool DocumentListController::rowCommand(ui::ListView& list, std::size_t index, ui::RowCommand command)
+bool DocumentListController::rowCommand(kit::ListView& list, std::size_t index, kit::RowCommand command)
 {
-    if (command == ui::RowCommand::Peek)
+    if (command == kit::RowCommand::Peek)
         return rowHeld(list, index);
-    constexpr std::pair<ui::RowCommand, DocumentListAction> actions[] = {
-        {ui::RowCommand::Rename, DocumentListAction::Rename},
-        {ui::RowCommand::Delete, DocumentListAction::Delete},
-        {ui::RowCommand::Info, DocumentListAction::Info},
+    constexpr std::pair<kit::RowCommand, DocumentListAction> actions[] = {
+        {kit::RowCommand::Rename, DocumentListAction::Rename},
+        {kit::RowCommand::Delete, DocumentListAction::Delete},
+        {kit::RowCommand::Info, DocumentListAction::Info},
     };
     const auto* action =
-        std::ranges::find(actions, command, &std::pair<ui::RowCommand, DocumentListAction>::first);
+        std::ranges::find(actions, command, &std::pair<kit::RowCommand, DocumentListAction>::first);
     const auto rows = _rows->rows();
     if (action == std::end(actions) || !rows || index >= rows->count()
         || !offers(action->second, rows->entry(index).kind))
@@ -244,7 +244,7 @@ bool DocumentListController::rowCommand(ui::ListView& list, std::size_t index, u
     return true;
 }
 
-bool DocumentListController::rowHeld(ui::ListView& list, std::size_t index)
+bool DocumentListController::rowHeld(kit::ListView& list, std::size_t index)
 {
     const auto told = delegate();
     const auto rows = _rows->rows();
@@ -265,7 +265,7 @@ bool DocumentListController::rowHeld(ui::ListView& list, std::size_t index)
     return true;
 }
 
-void DocumentListController::heldRowPressedOn(ui::ListView&)
+void DocumentListController::heldRowPressedOn(kit::ListView&)
 {
     const auto peek = _peek.lock();
     if (peek && presentedViewController() == peek)
@@ -280,16 +280,16 @@ void DocumentListController::openFromPeek(const Url& url, FolderEntryKind kind)
         open(url, kind);
 }
 
-void DocumentListController::selectionRequested(ui::ListView&)
+void DocumentListController::selectionRequested(kit::ListView&)
 {
     if (const auto told = delegate())
         told->documentListControllerRequestsEditing(self());
 }
 
 void DocumentListController::openOutOfDriveViewControllerAction(
-    const Url&, const std::shared_ptr<ui::ViewController>&, const std::function<void()>& action)
+    const Url&, const std::shared_ptr<kit::ViewController>&, const std::function<void()>& action)
 {
     action();
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -4,11 +4,12 @@
 // The order of a list, and the menu in which it is chosen.
 
 #include "platform/Localization.h"
+#include "screens/PlatformNames.h"
 #include "screens/list/DocumentListController.h"
 
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -24,9 +25,9 @@ constexpr KeyEntry keyEntries[] = {
     {OrderKey::Kind, "Kind"},
 };
 
-ui::MenuMark markIf(bool on)
+kit::MenuMark markIf(bool on)
 {
-    return on ? ui::MenuMark::On : ui::MenuMark::Off;
+    return on ? kit::MenuMark::On : kit::MenuMark::Off;
 }
 
 } // namespace
@@ -41,9 +42,9 @@ void DocumentListController::setOrder(const ListOrder& order)
     refresh();
 }
 
-ui::Menu DocumentListController::optionsMenu()
+kit::Menu DocumentListController::optionsMenu()
 {
-    ui::Menu menu;
+    kit::Menu menu;
     const auto calling = [this](auto operation) {
         return [weak = std::weak_ptr(self()), operation] {
             if (const auto list = weak.lock())
@@ -51,7 +52,7 @@ ui::Menu DocumentListController::optionsMenu()
         };
     };
     const auto choice = [&](const char* title, const ListOrder& order, bool isPresent) {
-        ui::MenuAction action;
+        kit::MenuAction action;
         action.title = localized(title);
         action.handler = calling([order](DocumentListController& list) { list.setOrder(order); });
         action.mark = markIf(isPresent);
@@ -83,4 +84,4 @@ ui::Menu DocumentListController::optionsMenu()
     return menu;
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -20,7 +20,7 @@
 #include <chrono>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -28,7 +28,7 @@ namespace {
 constexpr auto loadingDelay = std::chrono::milliseconds(300);
 constexpr auto librarySettles = std::chrono::seconds(1);
 
-void fill(ui::View& parent, const std::shared_ptr<ui::View>& view)
+void fill(kit::View& parent, const std::shared_ptr<kit::View>& view)
 {
     view->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
     view->setFrame(parent.bounds());
@@ -84,15 +84,15 @@ void DocumentListController::setDelegate(std::weak_ptr<DocumentListControllerDel
 
 void DocumentListController::loadView()
 {
-    const auto view = std::make_shared<ui::View>();
-    _listView = std::make_shared<ui::ListView>();
+    const auto view = std::make_shared<kit::View>();
+    _listView = std::make_shared<kit::ListView>();
     _listView->setAccessibility({.label = title(), .hint = {}});
     _listView->setRefreshable(true);
     _placeholder = PlaceholderView::create();
     _placeholder->setHidden(true);
     fill(*view, _listView);
     fill(*view, _placeholder);
-    _rowAnchor = std::make_shared<ui::View>();
+    _rowAnchor = std::make_shared<kit::View>();
     _rowAnchor->setHidden(true);
     view->addSubview(_rowAnchor);
     setView(view);
@@ -104,15 +104,15 @@ void DocumentListController::viewDidLoad()
     setDelegate(_delegate);
     _listView->setDataSource(_rows);
     _listView->setListDelegate(
-        std::shared_ptr<ui::ListViewDelegate>(self(), static_cast<ui::ListViewDelegate*>(this)));
-    _listView->setSelectionMode(_editing ? ui::SelectionMode::Multiple : ui::SelectionMode::None);
+        std::shared_ptr<kit::ListViewDelegate>(self(), static_cast<kit::ListViewDelegate*>(this)));
+    _listView->setSelectionMode(_editing ? kit::SelectionMode::Multiple : kit::SelectionMode::None);
     offerSearch();
     if (!_presentedURL)
         return;
     _order = savedOrder(*_presentedURL);
     navigationItem().setMenu(localized("Order and Options"), [weak = std::weak_ptr(self())] {
         const auto list = weak.lock();
-        return list ? list->optionsMenu() : ui::Menu();
+        return list ? list->optionsMenu() : kit::Menu();
     });
     _contents = FolderContents::create(
         *_presentedURL, [weak = std::weak_ptr(self())](const FolderContentsUpdate& update) {
@@ -129,7 +129,7 @@ void DocumentListController::takeKeyboard()
     // A list in a peek leaves the keyboard to the peek, one under a search or a question to that.
     const auto stack = navigationController();
     const bool isOnTop = stack && stack->topViewController().get() == this && !presentedViewController();
-    if (_hasTakenKeyboard || !isOnTop || appearanceState() != ui::AppearanceState::Appeared
+    if (_hasTakenKeyboard || !isOnTop || appearanceState() != kit::AppearanceState::Appeared
         || containedItemCount() == 0)
         return;
     _hasTakenKeyboard = true;
@@ -183,12 +183,12 @@ void DocumentListController::librariesMayHaveChanged()
 
 void DocumentListController::viewDidAppear(bool animated)
 {
-    ui::ViewController::viewDidAppear(animated);
+    kit::ViewController::viewDidAppear(animated);
     _hasTakenKeyboard = false;
     takeKeyboard();
     // The folders in it may hold something else since they were looked at.
     if (_rows) {
-        _rows->invalidateDetails(std::vector<ui::RowId>());
+        _rows->invalidateDetails(std::vector<kit::RowId>());
         _rows->visibleRowsDidChange();
     }
     // The delegate takes the list off the stack, which must not happen while the stack is still moving.
@@ -210,7 +210,7 @@ void DocumentListController::contentsDidChange(const FolderContentsUpdate& updat
         // Nearly every row has moved: one begins at the top again.
         _hasTakenKeyboard = false;
         _listView->reloadAll();
-        _listView->scrollToRow(0, ui::RowPosition::Top, false);
+        _listView->scrollToRow(0, kit::RowPosition::Top, false);
     } else {
         _listView->apply(update.changes);
     }
@@ -256,7 +256,7 @@ void DocumentListController::showLoadingAfterDelay()
 
 void DocumentListController::reportRemovalIfShown()
 {
-    if (!_wasRemoved || _reportedRemoval || appearanceState() != ui::AppearanceState::Appeared)
+    if (!_wasRemoved || _reportedRemoval || appearanceState() != kit::AppearanceState::Appeared)
         return;
     const auto told = delegate();
     _reportedRemoval = told != nullptr;
@@ -302,4 +302,4 @@ std::string logText(const std::shared_ptr<DocumentListController>& list)
     return "<DocumentListController " + list->presentedURL()->path() + ">";
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -8,6 +8,7 @@
 #include "platform/Error.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 #include "screens/list/DocumentListAction.h"
 #include "screens/list/DocumentListControllerDelegate.h"
 #include "screens/list/ListOrder.h"
@@ -22,12 +23,12 @@
 namespace platform {
 class FolderListing;
 }
-namespace platform::ui {
+namespace kit {
 class AlertController;
 class ListView;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 class DocumentRowSource;
 class DocumentSearch;
@@ -37,7 +38,7 @@ struct FolderContentsUpdate;
 
 /// The screen that shows one folder of the drive. It begins to list the folder when its view is loaded and
 /// follows every change from then on. Main thread only; nothing that could wait is done there.
-class DocumentListController : public ui::ViewController, private ui::ListViewDelegate {
+class DocumentListController : public kit::ViewController, private kit::ListViewDelegate {
 public:
     /// The list of the drive's top level, which shows the app libraries as well; null when there is no
     /// default container (signed out).
@@ -87,7 +88,7 @@ public:
     /// Runs an action that opens a document outside the program once what must be asked first was answered;
     /// nothing needs to be asked here, so the action runs at once.
     static void openOutOfDriveViewControllerAction(const Url& document,
-        const std::shared_ptr<ui::ViewController>& viewController, const std::function<void()>& action);
+        const std::shared_ptr<kit::ViewController>& viewController, const std::function<void()>& action);
 
     /// Lists the folder anew.
     void refresh();
@@ -97,7 +98,7 @@ public:
     /// Shows another order and keeps it for the folder.
     void setOrder(const ListOrder& order);
     /// The choices of order, and while editing what can be selected at once.
-    ui::Menu optionsMenu();
+    kit::Menu optionsMenu();
 
     /// Objects that others attach to the list, kept as long as it lives; null removes. Ask with the type that
     /// was attached.
@@ -114,20 +115,20 @@ public:
     void viewDidAppear(bool animated) override;
 
     /// The parts of the loaded view.
-    const std::shared_ptr<ui::ListView>& listView() const { return _listView; }
+    const std::shared_ptr<kit::ListView>& listView() const { return _listView; }
     const std::shared_ptr<PlaceholderView>& placeholder() const { return _placeholder; }
 
 private:
-    void rowActivated(ui::ListView& list, std::size_t index) override;
-    ui::Menu menuForRow(ui::ListView& list, std::size_t index) override;
-    ui::Menu menuForList(ui::ListView&) override { return optionsMenu(); }
-    void visibleRowsDidChange(ui::ListView& list, ui::RowRange range) override;
-    void selectionDidChange(ui::ListView& list) override;
-    void refreshRequested(ui::ListView& list) override;
-    bool rowCommand(ui::ListView& list, std::size_t index, ui::RowCommand command) override;
-    bool rowHeld(ui::ListView& list, std::size_t index) override;
-    void heldRowPressedOn(ui::ListView& list) override;
-    void selectionRequested(ui::ListView& list) override;
+    void rowActivated(kit::ListView& list, std::size_t index) override;
+    kit::Menu menuForRow(kit::ListView& list, std::size_t index) override;
+    kit::Menu menuForList(kit::ListView&) override { return optionsMenu(); }
+    void visibleRowsDidChange(kit::ListView& list, kit::RowRange range) override;
+    void selectionDidChange(kit::ListView& list) override;
+    void refreshRequested(kit::ListView& list) override;
+    bool rowCommand(kit::ListView& list, std::size_t index, kit::RowCommand command) override;
+    bool rowHeld(kit::ListView& list, std::size_t index) override;
+    void heldRowPressedOn(kit::ListView& list) override;
+    void selectionRequested(kit::ListView& list) override;
 
     std::shared_ptr<DocumentListController> self();
     void contentsDidChange(const FolderContentsUpdate& update);
@@ -141,20 +142,20 @@ private:
     void reportRemovalIfShown();
     void open(const Url& url, FolderEntryKind kind);
     void perform(DocumentListAction action, const Url& url);
-    ui::MenuAction downloadEntry(const Url& url);
+    kit::MenuAction downloadEntry(const Url& url);
     void download(const Url& url);
     /// The place of an item's row, for what points there; the list's when the row is not seen.
-    std::shared_ptr<ui::View> anchorFor(const Url& url);
+    std::shared_ptr<kit::View> anchorFor(const Url& url);
     void openFromPeek(const Url& url, FolderEntryKind kind);
     /// Whether an item may be done something to: the action is enabled, and its kind of item has it.
     bool offers(DocumentListAction action, FolderEntryKind kind) const;
 
     std::optional<Url> _presentedURL;
-    std::weak_ptr<ui::AlertController> _peek; ///< the latest
+    std::weak_ptr<kit::AlertController> _peek; ///< the latest
     std::weak_ptr<DocumentListControllerDelegate> _delegate;
-    std::shared_ptr<ui::ListView> _listView;
+    std::shared_ptr<kit::ListView> _listView;
     std::shared_ptr<PlaceholderView> _placeholder;
-    std::shared_ptr<ui::View> _rowAnchor; ///< never seen
+    std::shared_ptr<kit::View> _rowAnchor; ///< never seen
     std::shared_ptr<DocumentRowSource> _rows;
     std::shared_ptr<FolderContents> _contents;
     std::shared_ptr<DocumentSearch> _search;
@@ -173,4 +174,4 @@ private:
 /// How a list reads in a log line.
 std::string logText(const std::shared_ptr<DocumentListController>& list);
 
-} // namespace platform::components
+} // namespace screens

@@ -5,12 +5,12 @@
 
 #include "kit/values/StandardColors.h"
 
-namespace platform::components {
+namespace screens {
 
 std::vector<Color> DocumentListControllerDelegate::documentListControllerColorsForTagNames(
     const List&, const std::vector<std::string>& names)
 {
-    return std::vector<Color>(names.size(), ui::StandardColors::gray);
+    return std::vector<Color>(names.size(), kit::StandardColors::gray);
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -5,18 +5,19 @@
 
 #include "platform/Color.h"
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 
 #include <functional>
 #include <memory>
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 class View;
 class ViewController;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 class DocumentListController;
 
@@ -44,7 +45,7 @@ public:
     virtual void documentListControllerRequestsEditing(const List&) { }
 
     /// The screen for a peek at an item; null: none.
-    virtual std::shared_ptr<ui::ViewController> documentListControllerViewControllerForPreviewingItemAtURL(
+    virtual std::shared_ptr<kit::ViewController> documentListControllerViewControllerForPreviewingItemAtURL(
         const List&, const Url&)
     {
         return nullptr;
@@ -53,7 +54,7 @@ public:
     /// The user chose an action of an item; `action` is a code of DocumentListAction. The view is where a
     /// popover may point (null: nowhere); the completion is to be called when the action has ended.
     virtual void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,
-        const Url& url, const std::shared_ptr<ui::View>& /*originatingView*/, const Completion& completion)
+        const Url& url, const std::shared_ptr<kit::View>& /*originatingView*/, const Completion& completion)
     {
         documentListControllerPerformActionURL(list, action, url);
         if (completion)
@@ -67,4 +68,4 @@ public:
         const List& list, const std::vector<std::string>& names);
 };
 
-} // namespace platform::components
+} // namespace screens

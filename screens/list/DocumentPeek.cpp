@@ -7,24 +7,25 @@
 #include "kit/views/TapRecognizer.h"
 #include "kit/views/View.h"
 #include "platform/Localization.h"
+#include "screens/PlatformNames.h"
 
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
 /// Holds the peeked screen in a place of fixed height.
-class Miniature : public ui::ViewController {
+class Miniature : public kit::ViewController {
 public:
-    explicit Miniature(std::shared_ptr<ui::ViewController> screen)
+    explicit Miniature(std::shared_ptr<kit::ViewController> screen)
         : _screen(std::move(screen))
     {
     }
 
     void loadView() override
     {
-        const auto place = std::make_shared<ui::View>();
+        const auto place = std::make_shared<kit::View>();
         place->setPlacedByFrame(false);
         setView(place);
         addChildViewController(_screen);
@@ -35,7 +36,7 @@ public:
         place->addSubview(content);
         _screen->didMoveToParentViewController(shared_from_this());
         coverBy(place);
-        ui::LayoutConstraint::activate(
+        kit::LayoutConstraint::activate(
             {place->heightAnchor().equalToConstant(DocumentPeek::miniatureHeight)});
     }
 
@@ -52,13 +53,13 @@ public:
 
 private:
     /// A pane that takes the taps, so that a miniature opens as a whole.
-    void coverBy(const std::shared_ptr<ui::View>& place)
+    void coverBy(const std::shared_ptr<kit::View>& place)
     {
-        const auto pane = std::make_shared<ui::View>();
+        const auto pane = std::make_shared<kit::View>();
         pane->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
         pane->setFrame(place->bounds());
         pane->setAccessibility({.label = {}, .hint = {}, .isHidden = true});
-        pane->addGestureRecognizer(std::make_shared<ui::TapRecognizer>([weak = weak_from_this()](Point) {
+        pane->addGestureRecognizer(std::make_shared<kit::TapRecognizer>([weak = weak_from_this()](Point) {
             const auto self = std::static_pointer_cast<Miniature>(weak.lock());
             if (self && self->_onTap)
                 self->_onTap();
@@ -67,14 +68,14 @@ private:
     }
 
     std::function<void()> _onTap;
-    std::shared_ptr<ui::ViewController> _screen;
+    std::shared_ptr<kit::ViewController> _screen;
 };
 
-std::shared_ptr<ui::AlertAction> asAlertAction(const ui::MenuAction& action)
+std::shared_ptr<kit::AlertAction> asAlertAction(const kit::MenuAction& action)
 {
-    const bool isDestructive = action.style == ui::MenuActionStyle::Destructive;
-    auto made = std::make_shared<ui::AlertAction>(action.title,
-        isDestructive ? ui::AlertActionStyle::Destructive : ui::AlertActionStyle::Default,
+    const bool isDestructive = action.style == kit::MenuActionStyle::Destructive;
+    auto made = std::make_shared<kit::AlertAction>(action.title,
+        isDestructive ? kit::AlertActionStyle::Destructive : kit::AlertActionStyle::Default,
         [handler = action.handler](const auto&) { handler(); });
     made->setEnabled(action.enabled);
     return made;
@@ -82,13 +83,13 @@ std::shared_ptr<ui::AlertAction> asAlertAction(const ui::MenuAction& action)
 
 } // namespace
 
-std::shared_ptr<ui::AlertController> DocumentPeek::make(const std::string& title,
-    const std::shared_ptr<ui::ViewController>& screen, const ui::Menu& actions, std::function<void()> open)
+std::shared_ptr<kit::AlertController> DocumentPeek::make(const std::string& title,
+    const std::shared_ptr<kit::ViewController>& screen, const kit::Menu& actions, std::function<void()> open)
 {
     const auto peek =
-        std::make_shared<ui::AlertController>(title, std::string(), ui::AlertStyle::ActionSheet);
+        std::make_shared<kit::AlertController>(title, std::string(), kit::AlertStyle::ActionSheet);
     const auto miniature = std::make_shared<Miniature>(screen);
-    const auto opening = std::make_shared<ui::AlertAction>(localized("Open"), ui::AlertActionStyle::Default,
+    const auto opening = std::make_shared<kit::AlertAction>(localized("Open"), kit::AlertActionStyle::Default,
         [weak = std::weak_ptr(miniature), open = std::move(open)](const auto&) {
             if (const auto held = weak.lock())
                 held->release();
@@ -98,7 +99,7 @@ std::shared_ptr<ui::AlertController> DocumentPeek::make(const std::string& title
     peek->setPreferredAction(opening);
     for (const auto& action : actions)
         peek->addAction(asAlertAction(action));
-    peek->addAction(std::make_shared<ui::AlertAction>(localized("Cancel"), ui::AlertActionStyle::Cancel));
+    peek->addAction(std::make_shared<kit::AlertAction>(localized("Cancel"), kit::AlertActionStyle::Cancel));
     miniature->setOnTap([weak = std::weak_ptr(peek), opening] {
         if (const auto shown = weak.lock())
             shown->press(opening);
@@ -107,4 +108,4 @@ std::shared_ptr<ui::AlertController> DocumentPeek::make(const std::string& title
     return peek;
 }
 
-} // namespace platform::components
+} // namespace screens

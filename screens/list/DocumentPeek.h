@@ -9,12 +9,12 @@
 #include <memory>
 #include <string>
 
-namespace platform::ui {
+namespace kit {
 class AlertController;
 class ViewController;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 /// A look at an item without leaving the list: a small living picture of its screen above what can be done
 /// with it. The return key opens it, Escape and a tap beside it put it away.
@@ -24,9 +24,9 @@ inline constexpr double miniatureHeight = 260; ///< points
 
 /// `open` is called once the peek has closed and no longer holds the screen, which may then be shown
 /// elsewhere. Present what is answered; main thread.
-std::shared_ptr<ui::AlertController> make(const std::string& title,
-    const std::shared_ptr<ui::ViewController>& screen, const ui::Menu& actions, std::function<void()> open);
+std::shared_ptr<kit::AlertController> make(const std::string& title,
+    const std::shared_ptr<kit::ViewController>& screen, const kit::Menu& actions, std::function<void()> open);
 
 } // namespace DocumentPeek
 
-} // namespace platform::components
+} // namespace screens

@@ -14,7 +14,7 @@
 
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -28,7 +28,7 @@ bool opensAsFolder(FolderEntryKind kind)
 }
 
 std::string spokenDescription(
-    const ui::ListRow& row, const std::string& kind, const std::vector<std::string>& tagNames)
+    const kit::ListRow& row, const std::string& kind, const std::vector<std::string>& tagNames)
 {
     std::string spoken = row.title;
     const auto add = [&spoken](const std::string& part) {
@@ -37,9 +37,9 @@ std::string spokenDescription(
     };
     add(kind);
     add(row.detail);
-    if (row.download == ui::DownloadState::Downloading)
+    if (row.download == kit::DownloadState::Downloading)
         add(localized("Downloading"));
-    if (row.download == ui::DownloadState::InCloud)
+    if (row.download == kit::DownloadState::InCloud)
         add(localized("In the cloud"));
     for (const auto& name : tagNames)
         add(name);
@@ -48,21 +48,21 @@ std::string spokenDescription(
 
 } // namespace
 
-std::shared_ptr<DocumentRowSource> DocumentRowSource::create(const std::shared_ptr<ui::ListView>& list)
+std::shared_ptr<DocumentRowSource> DocumentRowSource::create(const std::shared_ptr<kit::ListView>& list)
 {
     const auto source = std::make_shared<DocumentRowSource>(list);
     const std::weak_ptr weak = source;
     source->_loader = std::make_shared<Loader>(
         "row details", QualityOfService::UserInitiated,
         [](const RowRequest& request) { return readRowDetails(request.url, request.kind); },
-        [weak](ui::RowId id, RowDetails details) {
+        [weak](kit::RowId id, RowDetails details) {
             if (const auto self = weak.lock())
                 self->detailsArrived(id, std::move(details));
         });
     source->_thumbnails = std::make_shared<ThumbnailLoader>(
         "row thumbnails", QualityOfService::Utility,
         [](const RowRequest& request) { return readRowThumbnail(request.url); },
-        [weak](ui::RowId id, std::optional<Image> thumbnail) {
+        [weak](kit::RowId id, std::optional<Image> thumbnail) {
             if (const auto self = weak.lock())
                 self->thumbnailArrived(id, std::move(thumbnail));
         });
@@ -70,41 +70,41 @@ std::shared_ptr<DocumentRowSource> DocumentRowSource::create(const std::shared_p
     return source;
 }
 
-DocumentRowSource::DocumentRowSource(const std::shared_ptr<ui::ListView>& list)
+DocumentRowSource::DocumentRowSource(const std::shared_ptr<kit::ListView>& list)
     : _list(list)
 {
 }
 
-std::size_t DocumentRowSource::numberOfRows(const ui::ListView&) const
+std::size_t DocumentRowSource::numberOfRows(const kit::ListView&) const
 {
     return _rows ? _rows->count() : 0;
 }
 
-ui::RowId DocumentRowSource::rowIdAtIndex(const ui::ListView&, std::size_t index) const
+kit::RowId DocumentRowSource::rowIdAtIndex(const kit::ListView&, std::size_t index) const
 {
     return _rows->ids()[index];
 }
 
 std::optional<std::size_t> DocumentRowSource::rowBeginningWith(
-    const ui::ListView&, std::string_view text, std::size_t from) const
+    const kit::ListView&, std::string_view text, std::size_t from) const
 {
     return _rows ? _rows->rowBeginningWith(text, from) : std::nullopt;
 }
 
-ui::ListRow DocumentRowSource::rowAtIndex(const ui::ListView&, std::size_t index) const
+kit::ListRow DocumentRowSource::rowAtIndex(const kit::ListView&, std::size_t index) const
 {
     const auto entry = _rows->entry(index);
-    ui::ListRow row;
+    kit::ListRow row;
     row.id = _rows->ids()[index];
     row.image = iconFor(index, entry);
     row.title = displayName(entry.name);
-    row.accessory = opensAsFolder(entry.kind) ? ui::RowAccessory::Disclosure : ui::RowAccessory::None;
-    row.download = entry.isPromise ? ui::DownloadState::InCloud : ui::DownloadState::Present;
+    row.accessory = opensAsFolder(entry.kind) ? kit::RowAccessory::Disclosure : kit::RowAccessory::None;
+    row.download = entry.isPromise ? kit::DownloadState::InCloud : kit::DownloadState::Present;
     const auto known = _known.find(row.id);
     const bool isKnown = known != _known.end();
     if (isKnown)
         complete(row, known->second.details);
-    if (row.download == ui::DownloadState::InCloud)
+    if (row.download == kit::DownloadState::InCloud)
         showDownload(row, index);
     if (isKnown && known->second.thumbnail)
         row.image = known->second.thumbnail;
@@ -115,12 +115,12 @@ ui::ListRow DocumentRowSource::rowAtIndex(const ui::ListView&, std::size_t index
     return row;
 }
 
-void DocumentRowSource::complete(ui::ListRow& row, const RowDetails& details) const
+void DocumentRowSource::complete(kit::ListRow& row, const RowDetails& details) const
 {
     if (details.name && !details.name->empty())
         row.title = displayName(*details.name);
     row.detail = details.text;
-    if (row.download == ui::DownloadState::Present)
+    if (row.download == kit::DownloadState::Present)
         row.download = details.download;
     if (_tagColors && !details.tagNames.empty())
         row.tagColors = _tagColors(details.tagNames);
@@ -137,12 +137,12 @@ void DocumentRowSource::followDownloads()
         });
 }
 
-void DocumentRowSource::showDownload(ui::ListRow& row, std::size_t index) const
+void DocumentRowSource::showDownload(kit::ListRow& row, std::size_t index) const
 {
     const auto progress = services().cloudDocumentService().items().downloadProgress(_rows->url(index));
     if (!progress)
         return;
-    row.download = ui::DownloadState::Downloading;
+    row.download = kit::DownloadState::Downloading;
     if (progress->total && *progress->total > 0)
         row.downloadProgress = static_cast<double>(progress->done) / static_cast<double>(*progress->total);
 }
@@ -213,7 +213,7 @@ std::vector<RowRequest> DocumentRowSource::visibleRowsThat(
 {
     std::vector<RowRequest> requests;
     const auto list = _list.lock();
-    const auto range = list && _rows ? list->visibleRows() : ui::RowRange();
+    const auto range = list && _rows ? list->visibleRows() : kit::RowRange();
     for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {
         const auto id = _rows->ids()[row];
         const auto known = _known.find(id);
@@ -230,7 +230,7 @@ void DocumentRowSource::fetchThumbnails()
     }));
 }
 
-void DocumentRowSource::thumbnailArrived(ui::RowId id, std::optional<Image> thumbnail)
+void DocumentRowSource::thumbnailArrived(kit::RowId id, std::optional<Image> thumbnail)
 {
     const auto known = _known.find(id);
     if (known == _known.end())
@@ -242,7 +242,7 @@ void DocumentRowSource::thumbnailArrived(ui::RowId id, std::optional<Image> thum
         tellIfVisible(id);
 }
 
-void DocumentRowSource::invalidateDetails(const std::optional<std::vector<ui::RowId>>& rows)
+void DocumentRowSource::invalidateDetails(const std::optional<std::vector<kit::RowId>>& rows)
 {
     for (auto& [id, known] : _known)
         known.isStale = known.isStale || !rows || known.details.isContainer;
@@ -255,7 +255,7 @@ void DocumentRowSource::invalidateDetails(const std::optional<std::vector<ui::Ro
     }
 }
 
-void DocumentRowSource::detailsArrived(ui::RowId id, RowDetails details)
+void DocumentRowSource::detailsArrived(kit::RowId id, RowDetails details)
 {
     auto& known = _known[id];
     const bool isNews = known.isNew || !(known.details == details);
@@ -266,7 +266,7 @@ void DocumentRowSource::detailsArrived(ui::RowId id, RowDetails details)
     fetchThumbnails();
 }
 
-void DocumentRowSource::tellIfVisible(ui::RowId id) const
+void DocumentRowSource::tellIfVisible(kit::RowId id) const
 {
     const auto list = _list.lock();
     if (!list)
@@ -278,11 +278,11 @@ void DocumentRowSource::tellIfVisible(ui::RowId id) const
     }
 }
 
-void DocumentRowSource::forgetDetailsOutside(const ui::RowRange& range)
+void DocumentRowSource::forgetDetailsOutside(const kit::RowRange& range)
 {
     if (_known.size() <= keptDetails)
         return;
-    std::unordered_map<ui::RowId, Known> kept;
+    std::unordered_map<kit::RowId, Known> kept;
     for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {
         if (auto known = _known.extract(_rows->ids()[row]))
             kept.insert(std::move(known));
@@ -290,4 +290,4 @@ void DocumentRowSource::forgetDetailsOutside(const ui::RowRange& range)
     _known = std::move(kept);
 }
 
-} // namespace platform::components
+} // namespace screens

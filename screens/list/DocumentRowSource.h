@@ -6,6 +6,7 @@
 #include "kit/views/ListViewDataSource.h"
 #include "platform/Color.h"
 #include "platform/NotificationCenter.h"
+#include "screens/PlatformNames.h"
 #include "screens/list/DocumentRows.h"
 #include "screens/list/RowDetails.h"
 #include "screens/list/VisibleRowLoader.h"
@@ -16,15 +17,15 @@
 #include <unordered_map>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 class ListView;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 /// Makes the rows of a document list from what the listing knows, and completes them with details that are
 /// fetched while they are visible. Main thread only.
-class DocumentRowSource : public ui::ListViewDataSource,
+class DocumentRowSource : public kit::ListViewDataSource,
                           public std::enable_shared_from_this<DocumentRowSource> {
 public:
     /// The dots for tags; called on the main thread for rows that are about to be seen.
@@ -33,8 +34,8 @@ public:
     /// Details of this many rows are kept; beyond, those that are not visible go.
     static constexpr std::size_t keptDetails = 600;
 
-    static std::shared_ptr<DocumentRowSource> create(const std::shared_ptr<ui::ListView>& list);
-    explicit DocumentRowSource(const std::shared_ptr<ui::ListView>& list);
+    static std::shared_ptr<DocumentRowSource> create(const std::shared_ptr<kit::ListView>& list);
+    explicit DocumentRowSource(const std::shared_ptr<kit::ListView>& list);
 
     const std::shared_ptr<const DocumentRows>& rows() const { return _rows; }
     /// The list has to be told the difference by the caller.
@@ -49,13 +50,13 @@ public:
     void visibleRowsDidChange();
     /// Items may have changed, or with nothing all: known details stay on the screen until the next
     /// `visibleRowsDidChange` has read them again. What folders hold may always have changed.
-    void invalidateDetails(const std::optional<std::vector<ui::RowId>>& rows = std::nullopt);
+    void invalidateDetails(const std::optional<std::vector<kit::RowId>>& rows = std::nullopt);
 
-    std::size_t numberOfRows(const ui::ListView& list) const override;
-    ui::ListRow rowAtIndex(const ui::ListView& list, std::size_t index) const override;
-    ui::RowId rowIdAtIndex(const ui::ListView& list, std::size_t index) const override;
+    std::size_t numberOfRows(const kit::ListView& list) const override;
+    kit::ListRow rowAtIndex(const kit::ListView& list, std::size_t index) const override;
+    kit::RowId rowIdAtIndex(const kit::ListView& list, std::size_t index) const override;
     std::optional<std::size_t> rowBeginningWith(
-        const ui::ListView& list, std::string_view text, std::size_t from) const override;
+        const kit::ListView& list, std::string_view text, std::size_t from) const override;
 
 private:
     struct Known {
@@ -67,31 +68,31 @@ private:
     using Loader = VisibleRowLoader<RowDetails>;
     using ThumbnailLoader = VisibleRowLoader<std::optional<Image>>;
 
-    void detailsArrived(ui::RowId id, RowDetails details);
-    void thumbnailArrived(ui::RowId id, std::optional<Image> thumbnail);
+    void detailsArrived(kit::RowId id, RowDetails details);
+    void thumbnailArrived(kit::RowId id, std::optional<Image> thumbnail);
     /// Asked with what is known of a row; null: nothing.
     std::vector<RowRequest> visibleRowsThat(
         const std::function<bool(const Known* known)>& lackSomething) const;
     void fetchThumbnails();
-    void tellIfVisible(ui::RowId id) const;
+    void tellIfVisible(kit::RowId id) const;
     void followDownloads();
-    void showDownload(ui::ListRow& row, std::size_t index) const;
-    void forgetDetailsOutside(const ui::RowRange& range);
-    void complete(ui::ListRow& row, const RowDetails& details) const;
+    void showDownload(kit::ListRow& row, std::size_t index) const;
+    void forgetDetailsOutside(const kit::RowRange& range);
+    void complete(kit::ListRow& row, const RowDetails& details) const;
     Image iconFor(std::size_t index, const FolderEntry& entry) const;
     const std::string& documentIcon(std::string_view name) const;
     const std::string& documentKind(std::string_view name) const;
     std::string spokenKind(const FolderEntry& entry) const;
 
-    std::weak_ptr<ui::ListView> _list;
+    std::weak_ptr<kit::ListView> _list;
     std::shared_ptr<const DocumentRows> _rows;
     std::shared_ptr<Loader> _loader;
     std::shared_ptr<ThumbnailLoader> _thumbnails;
     Observation _onDownloads;
     TagColors _tagColors;
     Places _places;
-    std::unordered_map<ui::RowId, Known> _known;
+    std::unordered_map<kit::RowId, Known> _known;
     mutable std::unordered_map<std::string, std::string> _iconsByExtension, _kindsByExtension;
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -12,16 +12,16 @@
 #include <unordered_map>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
-ui::RowId idOfName(std::string_view name)
+kit::RowId idOfName(std::string_view name)
 {
     return std::hash<std::string_view>{}(name);
 }
 
-ui::RowId idOfExtraItem(const Url& url)
+kit::RowId idOfExtraItem(const Url& url)
 {
     // A library may have the name of a folder beside it.
     return ~std::hash<std::string>{}(url.path());
@@ -33,18 +33,18 @@ unsigned appearance(const FolderEntry& entry)
     return static_cast<unsigned>(entry.kind) * 2 + (entry.isPromise ? 1 : 0);
 }
 
-std::unordered_map<ui::RowId, unsigned> appearances(const DocumentRows& rows)
+std::unordered_map<kit::RowId, unsigned> appearances(const DocumentRows& rows)
 {
-    std::unordered_map<ui::RowId, unsigned> found;
+    std::unordered_map<kit::RowId, unsigned> found;
     found.reserve(rows.count());
     for (std::size_t row = 0; row < rows.count(); ++row)
         found.emplace(rows.ids()[row], appearance(rows.entry(row)));
     return found;
 }
 
-std::vector<ui::RowRange> rangesOf(const SnapshotOrder::Indexes& rows)
+std::vector<kit::RowRange> rangesOf(const SnapshotOrder::Indexes& rows)
 {
-    std::vector<ui::RowRange> ranges;
+    std::vector<kit::RowRange> ranges;
     for (const auto row : rows) {
         if (!ranges.empty() && ranges.back().end() == row)
             ++ranges.back().count;
@@ -54,7 +54,7 @@ std::vector<ui::RowRange> rangesOf(const SnapshotOrder::Indexes& rows)
     return ranges;
 }
 
-std::vector<ui::RowRange> rowsOfOtherAppearance(const DocumentRows& before, const DocumentRows& after)
+std::vector<kit::RowRange> rowsOfOtherAppearance(const DocumentRows& before, const DocumentRows& after)
 {
     SnapshotOrder::Indexes changed;
     const auto known = appearances(before);
@@ -67,9 +67,9 @@ std::vector<ui::RowRange> rowsOfOtherAppearance(const DocumentRows& before, cons
 }
 
 /// The splices that take rows away and put others in.
-std::vector<ui::ListSplice> splicesOf(const SnapshotOrder::Step& step)
+std::vector<kit::ListSplice> splicesOf(const SnapshotOrder::Step& step)
 {
-    std::vector<ui::ListSplice> splices;
+    std::vector<kit::ListSplice> splices;
     auto goes = step.removed.begin();
     auto comes = step.inserted.begin();
     std::size_t before = 0, after = 0;
@@ -80,7 +80,7 @@ std::vector<ui::ListSplice> splicesOf(const SnapshotOrder::Step& step)
         const auto kept = std::min(untilGoing, untilComing);
         before += kept;
         after += kept;
-        ui::ListSplice splice{after, 0, 0};
+        kit::ListSplice splice{after, 0, 0};
         for (; goes != step.removed.end() && *goes == before; ++goes, ++before)
             ++splice.removed;
         for (; comes != step.inserted.end() && *comes == after; ++comes, ++after)
@@ -114,7 +114,7 @@ std::shared_ptr<const DocumentRows> DocumentRows::make(
     return rows;
 }
 
-ui::RowId DocumentRows::idAt(std::size_t row) const
+kit::RowId DocumentRows::idAt(std::size_t row) const
 {
     const auto* extra = extraItem(row);
     return extra ? idOfExtraItem(extra->url) : idOfName(entry(row).name);
@@ -140,7 +140,7 @@ std::optional<RowsStep> DocumentRows::revised(
     if (!order)
         return std::nullopt;
     const std::shared_ptr<DocumentRows> rows(new DocumentRows(snapshot, std::move(*order)));
-    RowsStep made{rows, {splicesOf(step), rangesOf(step.touched)}, std::vector<ui::RowId>()};
+    RowsStep made{rows, {splicesOf(step), rangesOf(step.touched)}, std::vector<kit::RowId>()};
     auto from = before._ids.begin();
     for (const auto& splice : made.changes.splices) {
         const auto kept = static_cast<std::ptrdiff_t>(splice.position - rows->_ids.size());
@@ -157,7 +157,7 @@ std::optional<RowsStep> DocumentRows::revised(
     return made;
 }
 
-ui::RowId DocumentRows::idFor(const Url& url) const
+kit::RowId DocumentRows::idFor(const Url& url) const
 {
     const bool isInFolder = url.deletingLastPathComponent() == _snapshot->folder();
     return isInFolder ? idOfName(url.lastPathComponent()) : idOfExtraItem(url);
@@ -174,11 +174,11 @@ std::optional<std::size_t> DocumentRows::rowBeginningWith(std::string_view text,
     return std::nullopt;
 }
 
-ui::ListChanges DocumentRows::changes(const DocumentRows& before, const DocumentRows& after)
+kit::ListChanges DocumentRows::changes(const DocumentRows& before, const DocumentRows& after)
 {
-    auto changes = ui::ListChanges::between(before.ids(), after.ids());
+    auto changes = kit::ListChanges::between(before.ids(), after.ids());
     changes.changed = rowsOfOtherAppearance(before, after);
     return changes;
 }
 
-} // namespace platform::components
+} // namespace screens

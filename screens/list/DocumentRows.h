@@ -6,6 +6,7 @@
 #include "kit/values/ListChanges.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 #include "screens/list/SnapshotOrder.h"
 
 #include <cstdint>
@@ -15,16 +16,16 @@
 #include <string_view>
 #include <vector>
 
-namespace platform::components {
+namespace screens {
 
 class DocumentRows;
 
 /// A new state of a list's rows, and the way to it from the state before.
 struct RowsStep {
     std::shared_ptr<const DocumentRows> rows;
-    ui::ListChanges changes;
+    kit::ListChanges changes;
     /// The rows whose items may have other details now; nothing: all may.
-    std::optional<std::vector<ui::RowId>> touched;
+    std::optional<std::vector<kit::RowId>> touched;
 };
 
 /// The rows that a folder list shows: the items of one snapshot in some order, with the identifiers of their
@@ -35,7 +36,7 @@ public:
         std::shared_ptr<const FolderSnapshot> snapshot, const ListOrder& order = {});
 
     std::size_t count() const { return _ids.size(); }
-    std::span<const ui::RowId> ids() const { return _ids; }
+    std::span<const kit::RowId> ids() const { return _ids; }
     FolderEntry entry(std::size_t row) const { return _snapshot->entry(snapshotIndex(row)); }
     Url url(std::size_t row) const { return _snapshot->url(snapshotIndex(row)); }
     /// Null for an item of the folder itself.
@@ -51,7 +52,7 @@ public:
         const DocumentRows& before, std::shared_ptr<const FolderSnapshot> snapshot, const ListOrder& order);
 
     /// The identifier that the row of an item has, whether it is there or not.
-    ui::RowId idFor(const Url& url) const;
+    kit::RowId idFor(const Url& url) const;
 
     /// The first row at or after `from`, and then from the top, whose name begins with a text,
     /// whatever its case and accents. Main thread.
@@ -59,18 +60,18 @@ public:
 
     /// The exact way from one state of a list to another; rows whose kind or promise changed count as
     /// changed.
-    static ui::ListChanges changes(const DocumentRows& before, const DocumentRows& after);
+    static kit::ListChanges changes(const DocumentRows& before, const DocumentRows& after);
 
 private:
     DocumentRows(std::shared_ptr<const FolderSnapshot> snapshot, SnapshotOrder order);
     static std::optional<RowsStep> revised(
         const DocumentRows& before, const std::shared_ptr<const FolderSnapshot>& snapshot);
     std::size_t snapshotIndex(std::size_t row) const { return _order.index(row); }
-    ui::RowId idAt(std::size_t row) const;
+    kit::RowId idAt(std::size_t row) const;
 
     std::shared_ptr<const FolderSnapshot> _snapshot;
     SnapshotOrder _order;
-    std::vector<ui::RowId> _ids;
+    std::vector<kit::RowId> _ids;
 };
 
-} // namespace platform::components
+} // namespace screens

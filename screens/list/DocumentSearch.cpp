@@ -13,7 +13,7 @@
 #include <algorithm>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -41,27 +41,27 @@ DocumentSearch::DocumentSearch(Handlers handlers)
 
 void DocumentSearch::build()
 {
-    _results = std::make_shared<ui::ListView>();
+    _results = std::make_shared<kit::ListView>();
     _results->setAccessibility({.label = localized("Search"), .hint = {}});
     _results->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
     _source = DocumentRowSource::create(_results);
     _source->setPlaces(placeText);
     _results->setDataSource(_source);
-    _results->setListDelegate(
-        std::shared_ptr<ui::ListViewDelegate>(shared_from_this(), static_cast<ui::ListViewDelegate*>(this)));
+    _results->setListDelegate(std::shared_ptr<kit::ListViewDelegate>(
+        shared_from_this(), static_cast<kit::ListViewDelegate*>(this)));
     _placeholder = PlaceholderView::create();
     _placeholder->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
     showState({});
-    _presentation = std::make_shared<ui::SearchPresentation>();
+    _presentation = std::make_shared<kit::SearchPresentation>();
     _presentation->setPlaceholder(localized("Search"));
     const auto& view = _presentation->view();
-    for (const std::shared_ptr<ui::View>& part :
-        {std::shared_ptr<ui::View>(_results), std::shared_ptr<ui::View>(_placeholder)}) {
+    for (const std::shared_ptr<kit::View>& part :
+        {std::shared_ptr<kit::View>(_results), std::shared_ptr<kit::View>(_placeholder)}) {
         part->setFrame(view->bounds());
         view->addSubview(part);
     }
-    _presentation->setDelegate(std::shared_ptr<ui::SearchPresentationDelegate>(
-        shared_from_this(), static_cast<ui::SearchPresentationDelegate*>(this)));
+    _presentation->setDelegate(std::shared_ptr<kit::SearchPresentationDelegate>(
+        shared_from_this(), static_cast<kit::SearchPresentationDelegate*>(this)));
     // It learns the names before the first letter is typed.
     begin();
 }
@@ -75,7 +75,7 @@ void DocumentSearch::begin()
         });
 }
 
-void DocumentSearch::searchQueryDidChange(ui::SearchPresentation&)
+void DocumentSearch::searchQueryDidChange(kit::SearchPresentation&)
 {
     _ahead = {};
     if (!_session)
@@ -83,13 +83,13 @@ void DocumentSearch::searchQueryDidChange(ui::SearchPresentation&)
     _session->setQuery(_presentation->query());
 }
 
-void DocumentSearch::searchResultsWanted(ui::SearchPresentation&)
+void DocumentSearch::searchResultsWanted(kit::SearchPresentation&)
 {
     ++_ahead.down;
     catchUp();
 }
 
-void DocumentSearch::searchResultChosen(ui::SearchPresentation&)
+void DocumentSearch::searchResultChosen(kit::SearchPresentation&)
 {
     _ahead.opens = true;
     catchUp();
@@ -109,7 +109,7 @@ void DocumentSearch::catchUp()
         _results->focusRow(row);
 }
 
-void DocumentSearch::searchDidDisappear(ui::SearchPresentation&)
+void DocumentSearch::searchDidDisappear(kit::SearchPresentation&)
 {
     _session.reset();
 }
@@ -120,7 +120,7 @@ void DocumentSearch::resultsArrived(const NameSearchResults& results)
     auto rows = rowsOf(results);
     const bool isSameQuery = before && results.query == _shownQuery;
     _shownQuery = results.query;
-    const auto changes = isSameQuery ? DocumentRows::changes(*before, *rows) : ui::ListChanges();
+    const auto changes = isSameQuery ? DocumentRows::changes(*before, *rows) : kit::ListChanges();
     _source->setRows(std::move(rows));
     if (isSameQuery)
         _results->apply(changes);
@@ -147,14 +147,14 @@ void DocumentSearch::showState(const NameSearchResults& results)
     _placeholder->setHidden(results.total > 0);
 }
 
-void DocumentSearch::rowActivated(ui::ListView&, std::size_t index)
+void DocumentSearch::rowActivated(kit::ListView&, std::size_t index)
 {
     const auto& rows = _source->rows();
     if (rows && index < rows->count())
         _handlers.chosen(rows->url(index), rows->entry(index).kind);
 }
 
-ui::Menu DocumentSearch::menuForRow(ui::ListView&, std::size_t index)
+kit::Menu DocumentSearch::menuForRow(kit::ListView&, std::size_t index)
 {
     const auto& rows = _source->rows();
     if (!rows || index >= rows->count())
@@ -166,9 +166,9 @@ ui::Menu DocumentSearch::menuForRow(ui::ListView&, std::size_t index)
     return {{.title = localized("Show in Its Folder"), .handler = std::move(show), .image = {}}};
 }
 
-void DocumentSearch::visibleRowsDidChange(ui::ListView&, ui::RowRange)
+void DocumentSearch::visibleRowsDidChange(kit::ListView&, kit::RowRange)
 {
     _source->visibleRowsDidChange();
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -7,17 +7,18 @@
 #include "kit/views/ListViewDelegate.h"
 #include "platform/NameSearch.h"
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 #include "screens/list/DocumentRows.h"
 
 #include <functional>
 #include <memory>
 #include <string>
 
-namespace platform::ui {
+namespace kit {
 class ListView;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 class DocumentRowSource;
 class PlaceholderView;
@@ -25,8 +26,8 @@ class PlaceholderView;
 /// The search over a folder list: the items of the whole drive whose names hold what is typed, each with its
 /// place. Main thread only.
 class DocumentSearch : public std::enable_shared_from_this<DocumentSearch>,
-                       private ui::SearchPresentationDelegate,
-                       private ui::ListViewDelegate {
+                       private kit::SearchPresentationDelegate,
+                       private kit::ListViewDelegate {
 public:
     /// What the user does with a result.
     struct Handlers {
@@ -38,21 +39,21 @@ public:
     explicit DocumentSearch(Handlers handlers);
 
     /// The screen to present; it shows the results.
-    const std::shared_ptr<ui::SearchPresentation>& presentation() const { return _presentation; }
-    const std::shared_ptr<ui::ListView>& results() const { return _results; }
+    const std::shared_ptr<kit::SearchPresentation>& presentation() const { return _presentation; }
+    const std::shared_ptr<kit::ListView>& results() const { return _results; }
     const std::shared_ptr<PlaceholderView>& placeholder() const { return _placeholder; }
     const std::shared_ptr<DocumentRowSource>& rowSource() const { return _source; }
 
 private:
     void build();
-    void searchQueryDidChange(ui::SearchPresentation& search) override;
-    void searchResultsWanted(ui::SearchPresentation& search) override;
-    void searchResultChosen(ui::SearchPresentation& search) override;
-    void searchDidDisappear(ui::SearchPresentation& search) override;
+    void searchQueryDidChange(kit::SearchPresentation& search) override;
+    void searchResultsWanted(kit::SearchPresentation& search) override;
+    void searchResultChosen(kit::SearchPresentation& search) override;
+    void searchDidDisappear(kit::SearchPresentation& search) override;
     void begin();
-    void rowActivated(ui::ListView& list, std::size_t index) override;
-    void visibleRowsDidChange(ui::ListView& list, ui::RowRange range) override;
-    ui::Menu menuForRow(ui::ListView& list, std::size_t index) override;
+    void rowActivated(kit::ListView& list, std::size_t index) override;
+    void visibleRowsDidChange(kit::ListView& list, kit::RowRange range) override;
+    kit::Menu menuForRow(kit::ListView& list, std::size_t index) override;
     void resultsArrived(const NameSearchResults& results);
     void showState(const NameSearchResults& results);
     /// Does what was typed ahead of the results, once they are there.
@@ -65,8 +66,8 @@ private:
     };
 
     Handlers _handlers;
-    std::shared_ptr<ui::SearchPresentation> _presentation;
-    std::shared_ptr<ui::ListView> _results;
+    std::shared_ptr<kit::SearchPresentation> _presentation;
+    std::shared_ptr<kit::ListView> _results;
     std::shared_ptr<PlaceholderView> _placeholder;
     std::shared_ptr<DocumentRowSource> _source;
     std::shared_ptr<NameSearchSession> _session;
@@ -75,4 +76,4 @@ private:
     Ahead _ahead;
 };
 
-} // namespace platform::components
+} // namespace screens

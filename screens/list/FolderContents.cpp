@@ -8,7 +8,7 @@
 #include <algorithm>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -105,4 +105,4 @@ void FolderContents::adopt(const FolderContentsUpdate& update)
         _update(update);
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -5,6 +5,7 @@
 
 #include "platform/Dispatch.h"
 #include "platform/FolderLister.h"
+#include "screens/PlatformNames.h"
 #include "screens/list/DocumentRows.h"
 
 #include <deque>
@@ -13,7 +14,7 @@
 #include <optional>
 #include <vector>
 
-namespace platform::components {
+namespace screens {
 
 /// A new state of a folder's list and the way to it from the state before.
 struct FolderContentsUpdate : RowsStep {
@@ -60,4 +61,4 @@ private:
     bool _isWorking = false;
 };
 
-} // namespace platform::components
+} // namespace screens

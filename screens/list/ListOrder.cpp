@@ -3,7 +3,7 @@
 
 #include "screens/list/ListOrder.h"
 
-namespace platform::components {
+namespace screens {
 
 ListOrder ListOrder::sortedBy(OrderKey chosen) const
 {
@@ -11,4 +11,4 @@ ListOrder ListOrder::sortedBy(OrderKey chosen) const
     return {chosen, largeFirst ? OrderDirection::Descending : OrderDirection::Ascending, grouping};
 }
 
-} // namespace platform::components
+} // namespace screens

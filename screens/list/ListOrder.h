@@ -5,10 +5,11 @@
 
 #include "platform/FolderLister.h"
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 
 #include <cstdint>
 
-namespace platform::components {
+namespace screens {
 
 enum class OrderKey : std::uint8_t { Name, Date, Size, Kind };
 enum class OrderDirection : std::uint8_t { Ascending, Descending };
@@ -33,4 +34,4 @@ struct ListOrder {
 ListOrder savedOrder(const Url& folder);
 void saveOrder(const Url& folder, const ListOrder& order);
 
-} // namespace platform::components
+} // namespace screens

@@ -5,10 +5,11 @@
 
 #include "platform/CharacterData.h"
 #include "platform/Services.h"
+#include "screens/PlatformNames.h"
 
 #include <algorithm>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -87,4 +88,4 @@ bool NamePrefix::beginsFolded(std::string_view name)
     return _answer;
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -7,7 +7,7 @@
 #include <string_view>
 #include <unordered_map>
 
-namespace platform::components {
+namespace screens {
 
 /// A text that names are asked for to begin with, without case and accents, in every script. Names whose
 /// first characters decide are not folded, so that a hundred thousand of them are asked in a few
@@ -28,4 +28,4 @@ private:
     bool _answer = false;
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -13,7 +13,7 @@
 #include <filesystem>
 #include <system_error>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -70,8 +70,8 @@ void describe(RowDetails& details, const Url& url, FolderEntryKind kind, const A
         details.text = joinedDetails(details.text, localized("Shared"));
     const auto* status = values.get<DownloadingStatus>(AttributeKey::DownloadingStatus);
     if (status && *status == DownloadingStatus::NotDownloaded)
-        details.download = ui::DownloadState::InCloud;
-    if (kind == FolderEntryKind::Document && details.download == ui::DownloadState::Present)
+        details.download = kit::DownloadState::InCloud;
+    if (kind == FolderEntryKind::Document && details.download == kit::DownloadState::Present)
         details.modified = values.optional<Date>(AttributeKey::ContentModificationDate);
 }
 
@@ -91,4 +91,4 @@ RowDetails readRowDetails(const Url& url, FolderEntryKind kind)
     return details;
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -7,18 +7,19 @@
 #include "platform/Date.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 
 #include <optional>
 #include <string>
 #include <vector>
 
-namespace platform::components {
+namespace screens {
 
 /// What a row shows beyond what the listing knows. A value.
 struct RowDetails {
     std::optional<std::string> name; ///< the localized name
     std::string text; ///< date and size, or date and number of items, and whether it is shared
-    ui::DownloadState download = ui::DownloadState::Present;
+    kit::DownloadState download = kit::DownloadState::Present;
     std::vector<std::string> tagNames;
     bool isContainer = false; ///< what it holds changes without a notice in its own folder
     std::optional<Date> modified; ///< a document that is here: its thumbnail is of this version
@@ -30,4 +31,4 @@ struct RowDetails {
 /// thread. What cannot be read is left out.
 RowDetails readRowDetails(const Url& url, FolderEntryKind kind);
 
-} // namespace platform::components
+} // namespace screens

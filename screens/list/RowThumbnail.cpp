@@ -10,7 +10,7 @@
 #include <array>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -81,4 +81,4 @@ std::optional<Image> readRowThumbnail(const Url& url)
     return scaledDown(thumbnails->front().image, rowThumbnailSide);
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -5,10 +5,11 @@
 
 #include "platform/Image.h"
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 
 #include <optional>
 
-namespace platform::components {
+namespace screens {
 
 /// The longer side of a row's thumbnail in pixels: 40 points at twice the resolution.
 inline constexpr int rowThumbnailSide = 80;
@@ -21,4 +22,4 @@ std::optional<Image> readRowThumbnail(const Url& url);
 /// for, with two pixels to a point; one that is small enough stays as it is.
 Image scaledDown(const Image& image, int side);
 
-} // namespace platform::components
+} // namespace screens

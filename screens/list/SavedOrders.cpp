@@ -5,6 +5,7 @@
 
 #include "platform/Services.h"
 #include "platform/UserDefaults.h"
+#include "screens/PlatformNames.h"
 #include "screens/list/ListOrder.h"
 
 #include <algorithm>
@@ -13,7 +14,7 @@
 #include <string>
 #include <string_view>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -85,4 +86,4 @@ void saveOrder(const Url& folder, const ListOrder& order)
     services().userDefaults().setData(defaultsKey, services().keyedArchiver().archive(orders));
 }
 
-} // namespace platform::components
+} // namespace screens

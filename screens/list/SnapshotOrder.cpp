@@ -17,7 +17,7 @@
 #include <unordered_map>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -307,4 +307,4 @@ std::optional<SnapshotOrder> SnapshotOrder::revised(const FolderSnapshot& after,
     return made;
 }
 
-} // namespace platform::components
+} // namespace screens

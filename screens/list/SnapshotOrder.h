@@ -4,6 +4,7 @@
 #pragma once
 
 #include "platform/FolderSnapshot.h"
+#include "screens/PlatformNames.h"
 #include "screens/list/ListOrder.h"
 
 #include <cstdint>
@@ -11,7 +12,7 @@
 #include <optional>
 #include <vector>
 
-namespace platform::components {
+namespace screens {
 
 class KindRanks;
 
@@ -48,4 +49,4 @@ private:
     std::shared_ptr<const KindRanks> _kinds;
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -8,6 +8,7 @@
 #include "platform/FolderSnapshot.h"
 #include "platform/Services.h"
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 
 #include <cstdint>
 #include <functional>
@@ -17,11 +18,11 @@
 #include <utility>
 #include <vector>
 
-namespace platform::components {
+namespace screens {
 
 /// A row that something is to be read for.
 struct RowRequest {
-    ui::RowId id;
+    kit::RowId id;
     Url url;
     FolderEntryKind kind;
 };
@@ -33,7 +34,7 @@ class VisibleRowLoader : public std::enable_shared_from_this<VisibleRowLoader<Va
 public:
     using Read = std::function<Value(const RowRequest&)>; ///< called on threads of a queue
     /// Called on the main thread, once for each row that is still wanted.
-    using Arrived = std::function<void(ui::RowId, Value)>;
+    using Arrived = std::function<void(kit::RowId, Value)>;
 
     VisibleRowLoader(std::string name, QualityOfService quality, Read read, Arrived arrived)
         : _shared(std::make_shared<Shared>())
@@ -46,7 +47,7 @@ public:
     /// The rows that still lack their value: others are not wanted any more.
     void setWanted(const std::vector<RowRequest>& requests)
     {
-        std::unordered_map<ui::RowId, Ticket> wanted;
+        std::unordered_map<kit::RowId, Ticket> wanted;
         std::vector<std::pair<const RowRequest*, Ticket>> added;
         const std::lock_guard lock(_shared->mutex);
         for (const auto& request : requests) {
@@ -69,7 +70,7 @@ public:
     }
 
     /// The same for one row.
-    void cancel(ui::RowId id)
+    void cancel(kit::RowId id)
     {
         const std::lock_guard lock(_shared->mutex);
         _shared->wanted.erase(id);
@@ -78,7 +79,7 @@ public:
 private:
     using Ticket = std::uint64_t;
     struct Found {
-        ui::RowId id;
+        kit::RowId id;
         Ticket ticket;
         Value value;
     };
@@ -86,11 +87,11 @@ private:
     struct Shared {
         std::mutex mutex;
         Read read;
-        std::unordered_map<ui::RowId, Ticket> wanted;
+        std::unordered_map<kit::RowId, Ticket> wanted;
         std::vector<Found> found;
         bool isDeliveryPosted = false;
 
-        bool isWanted(ui::RowId id, Ticket ticket)
+        bool isWanted(kit::RowId id, Ticket ticket)
         {
             const std::lock_guard lock(mutex);
             const auto known = wanted.find(id);
@@ -145,4 +146,4 @@ private:
     Ticket _nextTicket = 1;
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -6,10 +6,11 @@
 #include "kit/controllers/AlertController.h"
 #include "kit/views/TextField.h"
 #include "platform/Localization.h"
+#include "screens/PlatformNames.h"
 
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -30,19 +31,19 @@ bool canBeName(const std::string& name)
 
 } // namespace
 
-std::shared_ptr<ui::AlertController> makeFolderNameAlert(std::function<void(const std::string&)> chosen)
+std::shared_ptr<kit::AlertController> makeFolderNameAlert(std::function<void(const std::string&)> chosen)
 {
-    const auto alert =
-        std::make_shared<ui::AlertController>(localized("New Folder"), std::string(), ui::AlertStyle::Alert);
-    const std::weak_ptr<ui::AlertController> weak = alert;
-    alert->addTextField([](ui::TextField& field) {
+    const auto alert = std::make_shared<kit::AlertController>(
+        localized("New Folder"), std::string(), kit::AlertStyle::Alert);
+    const std::weak_ptr<kit::AlertController> weak = alert;
+    alert->addTextField([](kit::TextField& field) {
         field.setPlaceholder(localized("Name"));
         field.setInputTraits(
-            {.returnKey = ui::ReturnKey::Done, .clearButton = ui::ClearButton::WhileEditing});
+            {.returnKey = kit::ReturnKey::Done, .clearButton = kit::ClearButton::WhileEditing});
     });
-    alert->addAction(std::make_shared<ui::AlertAction>(localized("Cancel"), ui::AlertActionStyle::Cancel));
-    const auto create = std::make_shared<ui::AlertAction>(
-        localized("Create"), ui::AlertActionStyle::Default, [weak, chosen = std::move(chosen)](const auto&) {
+    alert->addAction(std::make_shared<kit::AlertAction>(localized("Cancel"), kit::AlertActionStyle::Cancel));
+    const auto create = std::make_shared<kit::AlertAction>(
+        localized("Create"), kit::AlertActionStyle::Default, [weak, chosen = std::move(chosen)](const auto&) {
             if (const auto asked = weak.lock())
                 chosen(trimmed(asked->textFields().front()->text()));
         });
@@ -58,4 +59,4 @@ std::shared_ptr<ui::AlertController> makeFolderNameAlert(std::function<void(cons
     return alert;
 }
 
-} // namespace platform::components
+} // namespace screens

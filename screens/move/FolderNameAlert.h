@@ -7,14 +7,14 @@
 #include <memory>
 #include <string>
 
-namespace platform::ui {
+namespace kit {
 class AlertController;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 /// An alert that asks for the name of a folder to be made. `chosen` is called once, after it has closed, with
 /// a name that can be one; not when the user cancels. Main thread only.
-std::shared_ptr<ui::AlertController> makeFolderNameAlert(std::function<void(const std::string&)> chosen);
+std::shared_ptr<kit::AlertController> makeFolderNameAlert(std::function<void(const std::string&)> chosen);
 
-} // namespace platform::components
+} // namespace screens

@@ -10,7 +10,7 @@
 #include <algorithm>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 std::shared_ptr<MoveTargetPicker> MoveTargetPicker::initWithItemsScope(
     std::vector<Url> items, MoveTargetScope scope)
@@ -28,7 +28,7 @@ MoveTargetPicker::MoveTargetPicker(std::vector<Url> items, MoveTargetScope scope
     : _itemsToMove(std::move(items))
     , _scope(scope)
 {
-    setPresentationStyle(ui::PresentationStyle::OverCurrentContext);
+    setPresentationStyle(kit::PresentationStyle::OverCurrentContext);
     setToolbarHidden(false);
 }
 
@@ -83,7 +83,7 @@ void MoveTargetPicker::enter(const Url& folder)
 
 void MoveTargetPicker::show(const Url& folder)
 {
-    std::vector<std::shared_ptr<ui::ViewController>> screens;
+    std::vector<std::shared_ptr<kit::ViewController>> screens;
     for (const auto& step : wayTo(folder))
         screens.push_back(makeScreen(step));
     if (!screens.empty())
@@ -115,4 +115,4 @@ void MoveTargetPicker::userCancelled()
     cancel();
 }
 
-} // namespace platform::components
+} // namespace screens

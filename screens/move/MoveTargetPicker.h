@@ -5,11 +5,12 @@
 
 #include "kit/controllers/NavigationController.h"
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 
 #include <memory>
 #include <vector>
 
-namespace platform::components {
+namespace screens {
 
 class MoveTargetPicker;
 class MoveTargetScreen;
@@ -34,7 +35,7 @@ enum class MoveTargetScope { Container, AllContainers };
 /// starts in the folder that the items lie in and shows new folders as they appear. A folder that is to be
 /// moved is dimmed and cannot be entered; the folder that the items lie in cannot be chosen. Main thread
 /// only.
-class MoveTargetPicker : public ui::NavigationController {
+class MoveTargetPicker : public kit::NavigationController {
 public:
     /// For items of one folder; with no item the picker starts at the drive's top level and lets nothing be
     /// chosen.
@@ -74,4 +75,4 @@ private:
     bool _hasEnded = false;
 };
 
-} // namespace platform::components
+} // namespace screens

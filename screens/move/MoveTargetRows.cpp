@@ -12,14 +12,14 @@
 #include <string_view>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
 constexpr const char* folderIcon = "folder";
 
 /// Rows are named after what they show, so that a row keeps its identifier wherever it stands.
-ui::RowId idOf(std::string_view group, std::string_view name)
+kit::RowId idOf(std::string_view group, std::string_view name)
 {
     return std::hash<std::string>{}(std::string(group) + '/' + std::string(name));
 }
@@ -54,31 +54,31 @@ std::optional<Url> MoveTargetRows::destination(std::size_t index) const
     return _isToBeMoved(folder) ? std::nullopt : std::optional(std::move(folder));
 }
 
-std::size_t MoveTargetRows::numberOfRows(const ui::ListView&) const
+std::size_t MoveTargetRows::numberOfRows(const kit::ListView&) const
 {
     return headRows() + _folders.size();
 }
 
-ui::RowKind MoveTargetRows::rowKindAtIndex(const ui::ListView&, std::size_t index) const
+kit::RowKind MoveTargetRows::rowKindAtIndex(const kit::ListView&, std::size_t index) const
 {
     const bool isHeading = index < headRows() && !isRecent(index);
-    return isHeading ? ui::RowKind::SectionHeader : ui::RowKind::Item;
+    return isHeading ? kit::RowKind::SectionHeader : kit::RowKind::Item;
 }
 
-ui::RowId MoveTargetRows::rowIdAtIndex(const ui::ListView&, std::size_t index) const
+kit::RowId MoveTargetRows::rowIdAtIndex(const kit::ListView&, std::size_t index) const
 {
     return idAt(index);
 }
 
-std::vector<ui::RowId> MoveTargetRows::ids() const
+std::vector<kit::RowId> MoveTargetRows::ids() const
 {
-    std::vector<ui::RowId> ids;
+    std::vector<kit::RowId> ids;
     for (std::size_t row = 0; row < headRows() + _folders.size(); ++row)
         ids.push_back(idAt(row));
     return ids;
 }
 
-ui::RowId MoveTargetRows::idAt(std::size_t index) const
+kit::RowId MoveTargetRows::idAt(std::size_t index) const
 {
     if (isRecent(index))
         return idOf("recent", _recents[index - 1].path());
@@ -88,9 +88,9 @@ ui::RowId MoveTargetRows::idAt(std::size_t index) const
     return idOf(entry.kind == FolderEntryKind::Library ? "library" : "folder", entry.name);
 }
 
-ui::ListRow MoveTargetRows::rowAtIndex(const ui::ListView& list, std::size_t index) const
+kit::ListRow MoveTargetRows::rowAtIndex(const kit::ListView& list, std::size_t index) const
 {
-    ui::ListRow row;
+    kit::ListRow row;
     if (isRecent(index))
         row = recentRow(index - 1);
     else if (index < headRows())
@@ -102,29 +102,29 @@ ui::ListRow MoveTargetRows::rowAtIndex(const ui::ListView& list, std::size_t ind
     return row;
 }
 
-ui::ListRow MoveTargetRows::recentRow(std::size_t index) const
+kit::ListRow MoveTargetRows::recentRow(std::size_t index) const
 {
     const auto& folder = _recents[index];
-    ui::ListRow row;
+    kit::ListRow row;
     row.image = Image::named("document-open-recent-symbolic");
     row.title = folderTitle(folder);
     const auto way = foldersDownTo(folder);
     if (way.size() > 1)
         row.detail = folderTitle(way[way.size() - 2]);
-    row.accessory = ui::RowAccessory::Disclosure;
+    row.accessory = kit::RowAccessory::Disclosure;
     return row;
 }
 
-ui::ListRow MoveTargetRows::folderRow(std::size_t index) const
+kit::ListRow MoveTargetRows::folderRow(std::size_t index) const
 {
     const auto entry = _snapshot->entry(_folders[index]);
     const auto* library = _snapshot->extraItem(_folders[index]);
-    ui::ListRow row;
+    kit::ListRow row;
     row.image = Image::named(library && !library->iconName.empty() ? library->iconName : folderIcon);
     row.title = displayName(entry.name);
-    row.accessory = ui::RowAccessory::Disclosure;
+    row.accessory = kit::RowAccessory::Disclosure;
     row.isDimmed = _isToBeMoved(_snapshot->url(_folders[index]));
     return row;
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -20,14 +20,14 @@
 #include <algorithm>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
 /// Beyond this the exact difference of two states would cost a frame.
 constexpr std::size_t differenceLimit = 2000;
 
-void fill(ui::View& parent, const std::shared_ptr<ui::View>& view)
+void fill(kit::View& parent, const std::shared_ptr<kit::View>& view)
 {
     view->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
     view->setFrame(parent.bounds());
@@ -53,8 +53,8 @@ std::shared_ptr<MoveTargetScreen> MoveTargetScreen::self()
 
 void MoveTargetScreen::loadView()
 {
-    const auto view = std::make_shared<ui::View>();
-    _listView = std::make_shared<ui::ListView>();
+    const auto view = std::make_shared<kit::View>();
+    _listView = std::make_shared<kit::ListView>();
     _listView->setAccessibility({.label = title(), .hint = {}});
     _placeholder = PlaceholderView::create();
     _placeholder->setHidden(true);
@@ -76,7 +76,7 @@ void MoveTargetScreen::viewDidLoad()
         });
     _listView->setDataSource(_rows);
     _listView->setListDelegate(
-        std::shared_ptr<ui::ListViewDelegate>(self(), static_cast<ui::ListViewDelegate*>(this)));
+        std::shared_ptr<kit::ListViewDelegate>(self(), static_cast<kit::ListViewDelegate*>(this)));
     _listing = services().folderLister().list(_folder,
         showsLibraries ? extraItemsOf(_folder) : std::vector<FolderSnapshot::ExtraItem>(),
         FolderGrouping::FoldersFirst,
@@ -95,23 +95,23 @@ void MoveTargetScreen::makeBars()
     const auto count = static_cast<std::int64_t>(picker->itemsToMove().size());
     navigationItem().setSubtitle(localizedPlural(".DICT.MOVE_ITEMS.%d", {count}));
     navigationItem().setRightItem(
-        std::make_shared<ui::BarButtonItem>(ui::SystemItem::Cancel, [weak = _picker](const auto&) {
+        std::make_shared<kit::BarButtonItem>(kit::SystemItem::Cancel, [weak = _picker](const auto&) {
             if (const auto picking = weak.lock())
                 picking->cancel();
         }));
-    const auto newFolder = std::make_shared<ui::BarButtonItem>(
+    const auto newFolder = std::make_shared<kit::BarButtonItem>(
         localized("New Folder"), [weak = std::weak_ptr(self())](const auto&) {
             if (const auto screen = weak.lock())
                 screen->askForNewFolder();
         });
-    _moveButton = std::make_shared<ui::BarButtonItem>(
+    _moveButton = std::make_shared<kit::BarButtonItem>(
         localized("Move Here"), [weak = _picker, folder = _folder](const auto&) {
             if (const auto picking = weak.lock())
                 picking->choose(folder);
         });
     _moveButton->setEnabled(picker->canChoose(_folder));
     setToolbarItems(
-        {newFolder, std::make_shared<ui::BarButtonItem>(ui::SystemItem::FlexibleSpace), _moveButton});
+        {newFolder, std::make_shared<kit::BarButtonItem>(kit::SystemItem::FlexibleSpace), _moveButton});
 }
 
 bool MoveTargetScreen::backRequested()
@@ -120,7 +120,7 @@ bool MoveTargetScreen::backRequested()
     const auto picker = _picker.lock();
     if (!picker || picker->viewControllers().front() != shared_from_this())
         return false;
-    return ui::ViewController::backRequested();
+    return kit::ViewController::backRequested();
 }
 
 void MoveTargetScreen::snapshotArrived(const std::shared_ptr<const FolderSnapshot>& snapshot)
@@ -129,7 +129,7 @@ void MoveTargetScreen::snapshotArrived(const std::shared_ptr<const FolderSnapsho
     _rows->setSnapshot(snapshot);
     const auto after = _rows->ids();
     if (std::max(before.size(), after.size()) <= differenceLimit)
-        _listView->apply(ui::ListChanges::between(before, after));
+        _listView->apply(kit::ListChanges::between(before, after));
     else
         _listView->reloadAll();
     const auto picker = _picker.lock();
@@ -185,7 +185,7 @@ void MoveTargetScreen::showRecents(std::vector<Url> recents)
     _placeholder->setHidden(true);
 }
 
-void MoveTargetScreen::rowActivated(ui::ListView&, std::size_t index)
+void MoveTargetScreen::rowActivated(kit::ListView&, std::size_t index)
 {
     const auto picker = _picker.lock();
     const auto folder = _rows->destination(index);
@@ -230,10 +230,10 @@ void MoveTargetScreen::folderWasMade(const Url& made, const std::optional<Error>
         picker->enter(made);
     if (!error)
         return;
-    const auto alert = std::make_shared<ui::AlertController>(
-        localized("The folder cannot be made"), errorWords(*error), ui::AlertStyle::Alert);
-    alert->addAction(std::make_shared<ui::AlertAction>(localized("OK"), ui::AlertActionStyle::Cancel));
+    const auto alert = std::make_shared<kit::AlertController>(
+        localized("The folder cannot be made"), errorWords(*error), kit::AlertStyle::Alert);
+    alert->addAction(std::make_shared<kit::AlertAction>(localized("OK"), kit::AlertActionStyle::Cancel));
     presentViewController(alert, true);
 }
 
-} // namespace platform::components
+} // namespace screens

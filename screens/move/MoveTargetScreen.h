@@ -7,6 +7,7 @@
 #include "kit/views/ListViewDelegate.h"
 #include "platform/Dispatch.h"
 #include "platform/FolderLister.h"
+#include "screens/PlatformNames.h"
 #include "screens/move/MoveTargetRows.h"
 
 #include <memory>
@@ -14,18 +15,18 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 class ListView;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 class MoveTargetPicker;
 class PlaceholderView;
 
 /// One folder of a MoveTargetPicker: its folders, and while the picker starts the recent destinations above
 /// them. Main thread only.
-class MoveTargetScreen : public ui::ViewController, private ui::ListViewDelegate {
+class MoveTargetScreen : public kit::ViewController, private kit::ListViewDelegate {
 public:
     /// The destinations shown as recent, at most.
     static constexpr std::size_t shownRecents = 3;
@@ -34,7 +35,7 @@ public:
     ~MoveTargetScreen() override;
 
     const Url& folder() const { return _folder; }
-    const std::shared_ptr<ui::ListView>& listView() const { return _listView; }
+    const std::shared_ptr<kit::ListView>& listView() const { return _listView; }
     const std::shared_ptr<PlaceholderView>& placeholder() const { return _placeholder; }
 
     /// Asks for a name, and makes and enters the folder with it.
@@ -45,7 +46,7 @@ public:
     bool backRequested() override;
 
 private:
-    void rowActivated(ui::ListView& list, std::size_t index) override;
+    void rowActivated(kit::ListView& list, std::size_t index) override;
 
     std::shared_ptr<MoveTargetScreen> self();
     void makeBars();
@@ -58,12 +59,12 @@ private:
 
     std::weak_ptr<MoveTargetPicker> _picker;
     Url _folder;
-    std::shared_ptr<ui::ListView> _listView;
+    std::shared_ptr<kit::ListView> _listView;
     std::shared_ptr<PlaceholderView> _placeholder;
-    std::shared_ptr<ui::BarButtonItem> _moveButton;
+    std::shared_ptr<kit::BarButtonItem> _moveButton;
     std::shared_ptr<MoveTargetRows> _rows;
     std::shared_ptr<FolderListing> _listing;
     std::shared_ptr<OperationQueue> _queue;
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -9,7 +9,7 @@
 #include <algorithm>
 #include <string>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -45,4 +45,4 @@ void RecentMoveTargets::remember(const Url& folder)
         key, services().keyedArchiver().archive(PropertyValue(std::move(paths))));
 }
 
-} // namespace platform::components
+} // namespace screens

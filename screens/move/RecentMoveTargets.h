@@ -4,11 +4,12 @@
 #pragma once
 
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 
 #include <cstddef>
 #include <vector>
 
-namespace platform::components {
+namespace screens {
 
 /// The folders that items were moved to last, the latest one first, kept between runs. They may be gone by
 /// now. Main thread only.
@@ -20,4 +21,4 @@ public:
     static void remember(const Url& folder);
 };
 
-} // namespace platform::components
+} // namespace screens

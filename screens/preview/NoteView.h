@@ -10,10 +10,10 @@
 #include <string>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 /// A text of several lines that a person writes. Main thread only.
-class NoteView : public ui::HostedView {
+class NoteView : public kit::HostedView {
 public:
     static constexpr const char* kindName = "note";
     static constexpr double height = 132; ///< points
@@ -33,7 +33,7 @@ private:
 };
 
 /// A note as the content of an alert.
-class NoteScreen : public ui::ViewController {
+class NoteScreen : public kit::ViewController {
 public:
     /// `name` is what the text is called, for those who do not see it.
     NoteScreen(const std::string& name, std::string text)
@@ -46,11 +46,11 @@ public:
     void loadView() override
     {
         setView(_note);
-        _note->anchor(ui::LayoutAttribute::Height).equalToConstant(NoteView::height)->setActive(true);
+        _note->anchor(kit::LayoutAttribute::Height).equalToConstant(NoteView::height)->setActive(true);
     }
 
 private:
     std::shared_ptr<NoteView> _note;
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -7,7 +7,7 @@
 #include <cmath>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -256,4 +256,4 @@ bool PageDeck::isBroken(std::size_t page) const
     return kept != _kept.end() && !kept->second.picture;
 }
 
-} // namespace platform::components
+} // namespace screens

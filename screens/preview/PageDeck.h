@@ -5,13 +5,14 @@
 
 #include "platform/Geometry.h"
 #include "platform/Image.h"
+#include "screens/PlatformNames.h"
 
 #include <cstddef>
 #include <map>
 #include <optional>
 #include <vector>
 
-namespace platform::components {
+namespace screens {
 
 /// Pages one below the other, and the pictures that are kept of them. The widest page fits the window at a
 /// zoom of 1. "Content" points are the interface's from the top left corner of all the pages; "page" points
@@ -89,4 +90,4 @@ private:
     std::optional<Detail> _detail;
 };
 
-} // namespace platform::components
+} // namespace screens

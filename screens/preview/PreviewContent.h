@@ -7,12 +7,13 @@
 #include "platform/Geometry.h"
 #include "platform/ImageLoader.h"
 #include "platform/PagedDocument.h"
+#include "screens/PlatformNames.h"
 
 #include <memory>
 #include <optional>
 #include <string>
 
-namespace platform::components {
+namespace screens {
 
 /// What a preview shows of a document, ready to be put on the screen. A value.
 struct PreviewContent {
@@ -41,4 +42,4 @@ struct PreviewContent {
     bool canRetry = false; ///< of a failure: trying again may help
 };
 
-} // namespace platform::components
+} // namespace screens

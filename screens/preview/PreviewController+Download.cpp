@@ -7,6 +7,7 @@
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "screens/ErrorWords.h"
+#include "screens/PlatformNames.h"
 #include "screens/preview/PreviewContent.h"
 #include "screens/preview/PreviewController.h"
 #include "screens/preview/PreviewLoader.h"
@@ -15,7 +16,7 @@
 
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -132,4 +133,4 @@ void PreviewController::downloadEnded(const std::optional<Error>& error)
     show(std::make_shared<const PreviewContent>(std::move(failure)));
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -22,7 +22,7 @@
 #include <cerrno>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -246,10 +246,10 @@ void PreviewController::askAfterFailure(const Editing& editing, const EditsKept&
     if (std::ranges::count(_edited, editing) == 0)
         _edited.push_back(editing);
     const std::weak_ptr<PreviewController> weak = self();
-    const auto question =
-        std::make_shared<ui::AlertController>(localized("“%@” could not be saved", {nameOf(editing->item())}),
-            outcome.error ? whyNotChanged(*outcome.error) : std::string(), ui::AlertStyle::Alert);
-    question->addAction(alertAction(localized("Try Again"), ui::AlertActionStyle::Default, [weak, editing] {
+    const auto question = std::make_shared<kit::AlertController>(
+        localized("“%@” could not be saved", {nameOf(editing->item())}),
+        outcome.error ? whyNotChanged(*outcome.error) : std::string(), kit::AlertStyle::Alert);
+    question->addAction(alertAction(localized("Try Again"), kit::AlertActionStyle::Default, [weak, editing] {
         if (const auto screen = weak.lock())
             screen->keep(editing);
     }));
@@ -259,24 +259,24 @@ void PreviewController::askAfterFailure(const Editing& editing, const EditsKept&
 
 void PreviewController::askForUnsaved(const Editing& editing)
 {
-    const auto question = std::make_shared<ui::AlertController>(
+    const auto question = std::make_shared<kit::AlertController>(
         localized("Your changes to “%@” are not saved", {nameOf(editing->item())}), std::string(),
-        ui::AlertStyle::Alert);
+        kit::AlertStyle::Alert);
     addCopyAndDiscard(*question, editing);
     alert(question);
 }
 
-void PreviewController::addCopyAndDiscard(ui::AlertController& question, const Editing& editing)
+void PreviewController::addCopyAndDiscard(kit::AlertController& question, const Editing& editing)
 {
     const std::weak_ptr<PreviewController> weak = self();
-    question.addAction(alertAction(localized("Keep a Copy"), ui::AlertActionStyle::Default, [weak, editing] {
+    question.addAction(alertAction(localized("Keep a Copy"), kit::AlertActionStyle::Default, [weak, editing] {
         editing->saveCopy([weak, editing](const EditsKept& outcome) {
             if (const auto screen = weak.lock())
                 screen->keptCopy(editing, outcome);
         });
     }));
     question.addAction(
-        alertAction(localized("Discard Changes"), ui::AlertActionStyle::Destructive, [weak, editing] {
+        alertAction(localized("Discard Changes"), kit::AlertActionStyle::Destructive, [weak, editing] {
             editing->discard();
             if (const auto screen = weak.lock())
                 screen->showOnDisk(editing);
@@ -331,7 +331,7 @@ void PreviewController::programEnds()
 }
 
 /// Over what is on the screen now, which may be another one by the time that something has gone wrong.
-void PreviewController::alert(const std::shared_ptr<ui::ViewController>& alert)
+void PreviewController::alert(const std::shared_ptr<kit::ViewController>& alert)
 {
     const auto own = navigationController();
     if (const auto navigation = own ? own : _lastNavigation.lock())
@@ -340,4 +340,4 @@ void PreviewController::alert(const std::shared_ptr<ui::ViewController>& alert)
         presentViewController(alert, true);
 }
 
-} // namespace platform::components
+} // namespace screens

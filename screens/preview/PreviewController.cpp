@@ -26,7 +26,7 @@
 #include <chrono>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -64,7 +64,7 @@ void PreviewController::setDataSource(std::weak_ptr<PreviewControllerDataSource>
     _dataSource = std::move(dataSource);
 }
 
-void PreviewController::setAdditionalRightBarButtonItems(ui::BarButtonItems items)
+void PreviewController::setAdditionalRightBarButtonItems(kit::BarButtonItems items)
 {
     _additionalItems = std::move(items);
     navigationItem().setRightItems(_additionalItems);
@@ -256,7 +256,7 @@ void PreviewController::showContent()
     else if (!_download)
         showSummary();
     // Who only had a glimpse at it has not asked for it.
-    if (appearanceState() == ui::AppearanceState::Appeared)
+    if (appearanceState() == kit::AppearanceState::Appeared)
         startDownload();
 }
 
@@ -351,7 +351,7 @@ void PreviewController::openIn()
 {
     if (!_item || !_openIn)
         return;
-    std::shared_ptr<ui::View> from = view();
+    std::shared_ptr<kit::View> from = view();
     if (_summary && !_summary->buttons().empty())
         from = _summary->buttons().front();
     _openIn(*_item, from);
@@ -396,4 +396,4 @@ void PreviewController::endSearch()
     _previewView->takeFocus();
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -9,6 +9,7 @@
 #include "platform/FileSystem.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 #include "screens/preview/PreviewControllerProtocols.h"
 
 #include <atomic>
@@ -23,12 +24,12 @@ class OperationQueue;
 struct DownloadProgress;
 } // namespace platform
 
-namespace platform::ui {
+namespace kit {
 class AlertController;
 class NavigationController;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 class PreviewScreenView;
 class PreviewEditing;
@@ -42,7 +43,7 @@ struct PreviewLimits;
 /// The screen that shows one document: a picture, a text, pages, sound or a film, or for everything else its
 /// icon with name, kind and size. Content is read off the main thread, within limits (see PreviewLoader).
 /// Main thread only.
-class PreviewController : public ui::ViewController {
+class PreviewController : public kit::ViewController {
 public:
     PreviewController();
     ~PreviewController() override;
@@ -59,11 +60,11 @@ public:
     const std::optional<Url>& currentPreviewItem() const { return _item; }
 
     /// Buttons at the right end of the navigation bar, the first one at the edge.
-    const ui::BarButtonItems& additionalRightBarButtonItems() const { return _additionalItems; }
-    void setAdditionalRightBarButtonItems(ui::BarButtonItems items);
+    const kit::BarButtonItems& additionalRightBarButtonItems() const { return _additionalItems; }
+    void setAdditionalRightBarButtonItems(kit::BarButtonItems items);
 
     /// Opens a document elsewhere, beginning at a view of the screen. Without it no such button is offered.
-    using OpenInHandler = std::function<void(const Url& item, const std::shared_ptr<ui::View>& from)>;
+    using OpenInHandler = std::function<void(const Url& item, const std::shared_ptr<kit::View>& from)>;
     void setOpenInHandler(OpenInHandler handler);
 
     void loadView() override;
@@ -117,13 +118,13 @@ private:
     void keep(const std::shared_ptr<PreviewEditing>& editing);
     void kept(const std::shared_ptr<PreviewEditing>& editing, const EditsKept& outcome);
     void askForUnsaved(const std::shared_ptr<PreviewEditing>& editing);
-    void addCopyAndDiscard(ui::AlertController& question, const std::shared_ptr<PreviewEditing>& editing);
+    void addCopyAndDiscard(kit::AlertController& question, const std::shared_ptr<PreviewEditing>& editing);
     void keptCopy(const std::shared_ptr<PreviewEditing>& editing, const EditsKept& outcome);
     void showOnDisk(const std::shared_ptr<PreviewEditing>& editing);
     void askAfterFailure(const std::shared_ptr<PreviewEditing>& editing, const EditsKept& outcome);
     void followChange();
     void programEnds();
-    void alert(const std::shared_ptr<ui::ViewController>& alert);
+    void alert(const std::shared_ptr<kit::ViewController>& alert);
     bool shouldSave(const Url& item);
     void startAgain();
     void openIn();
@@ -151,13 +152,13 @@ private:
     std::vector<std::shared_ptr<PreviewEditing>> _edited; ///< those whose edits may not be on the disk yet
     bool _isEditingWanted = false; ///< the document is being read for it
     std::optional<ItemVersion> _savedVersion; ///< what was saved here, which is shown already
-    std::weak_ptr<ui::NavigationController> _lastNavigation; ///< where to say what goes wrong afterwards
+    std::weak_ptr<kit::NavigationController> _lastNavigation; ///< where to say what goes wrong afterwards
     std::vector<Observation> _observations;
     bool _isDownloadWanted = true; ///< false once the person has stopped it
-    ui::BarButtonItems _additionalItems;
+    kit::BarButtonItems _additionalItems;
     std::shared_ptr<OperationQueue> _queue;
     Token _cancelled;
     unsigned _generation = 0; ///< of the latest load; an older one that ends is ignored
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -4,10 +4,11 @@
 #pragma once
 
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 
 #include <cstddef>
 
-namespace platform::components {
+namespace screens {
 
 class PreviewController;
 
@@ -35,4 +36,4 @@ public:
     }
 };
 
-} // namespace platform::components
+} // namespace screens

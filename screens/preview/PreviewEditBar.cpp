@@ -5,11 +5,12 @@
 
 #include "kit/views/Button.h"
 #include "platform/Localization.h"
+#include "screens/PlatformNames.h"
 
 #include <algorithm>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 std::shared_ptr<PreviewEditBar> PreviewEditBar::create()
 {
@@ -35,7 +36,7 @@ void PreviewEditBar::build()
     };
     const auto self = std::static_pointer_cast<PreviewEditBar>(shared_from_this());
     for (const auto& [tool, icon, name] : tools) {
-        const auto button = std::make_shared<ui::Button>(
+        const auto button = std::make_shared<kit::Button>(
             icon ? std::string() : name, [weak = std::weak_ptr(self), pressed = tool] {
                 const auto bar = weak.lock();
                 if (const auto call = bar ? bar->_onTool : nullptr)
@@ -44,7 +45,7 @@ void PreviewEditBar::build()
         if (icon)
             button->setImage(Image::named(icon));
         else
-            button->setButtonStyle(ui::ButtonStyle::Suggested);
+            button->setButtonStyle(kit::ButtonStyle::Suggested);
         button->setAccessibilityLabel(name);
         addSubview(button);
         _buttons[tool] = button;
@@ -67,8 +68,8 @@ void PreviewEditBar::setState(const State& state)
 void PreviewEditBar::layoutSubviews()
 {
     const double width = bounds().width;
-    const bool isMirrored = traits().layoutDirection == ui::LayoutDirection::RightToLeft;
-    const auto place = [&](ui::View& view, double x, double y, double itemWidth, double height) {
+    const bool isMirrored = traits().layoutDirection == kit::LayoutDirection::RightToLeft;
+    const auto place = [&](kit::View& view, double x, double y, double itemWidth, double height) {
         view.setFrame({isMirrored ? width - x - itemWidth : x, y, itemWidth, height});
     };
     double x = 0;
@@ -85,4 +86,4 @@ void PreviewEditBar::layoutSubviews()
     place(done, width - doneWidth, margin, doneWidth - margin, barHeight - 2 * margin);
 }
 
-} // namespace platform::components
+} // namespace screens

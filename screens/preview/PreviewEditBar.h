@@ -9,22 +9,22 @@
 #include <map>
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 class Button;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 /// What a person does to a document that is being changed.
 enum class EditTool { Undo, Highlight, Underline, Note, PreviousField, NextField, Done };
 
 /// The bar below a document that is being changed. Main thread only.
-class PreviewEditBar : public ui::View {
+class PreviewEditBar : public kit::View {
 public:
     static constexpr double barHeight = 48; ///< points; also the side of a button with a picture
 
     static std::shared_ptr<PreviewEditBar> create();
-    using ui::View::View;
+    using kit::View::View;
 
     void setOnTool(std::function<void(EditTool)> callback) { _onTool = std::move(callback); }
     /// What can be done now. Tools that the document has no use for are not shown at all.
@@ -32,15 +32,15 @@ public:
         bool canUndo = false, canMark = false, hasMarkable = false, hasFields = false;
     };
     void setState(const State& state);
-    std::shared_ptr<ui::Button> button(EditTool tool) const { return _buttons.at(tool); }
+    std::shared_ptr<kit::Button> button(EditTool tool) const { return _buttons.at(tool); }
 
     void layoutSubviews() override;
 
 private:
     void build();
 
-    std::map<EditTool, std::shared_ptr<ui::Button>> _buttons;
+    std::map<EditTool, std::shared_ptr<kit::Button>> _buttons;
     std::function<void(EditTool)> _onTool;
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -12,7 +12,7 @@
 #include <mutex>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -265,4 +265,4 @@ EditsKept PreviewEditing::keepNow(EditsPlace place)
     return outcome;
 }
 
-} // namespace platform::components
+} // namespace screens

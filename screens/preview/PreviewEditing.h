@@ -6,13 +6,14 @@
 #include "platform/FileSystem.h"
 #include "platform/PagedDocumentEditing.h"
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 
 #include <functional>
 #include <memory>
 #include <optional>
 #include <string>
 
-namespace platform::components {
+namespace screens {
 
 /// Where edits are to go.
 enum class EditsPlace { Document, Copy };
@@ -91,4 +92,4 @@ private:
     unsigned _kept = 0; ///< the last step in what was kept
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -7,13 +7,14 @@
 #include "kit/views/TextField.h"
 #include "platform/Localization.h"
 #include "screens/AlertParts.h"
+#include "screens/PlatformNames.h"
 #include "screens/preview/NoteView.h"
 #include "screens/preview/PreviewFieldBar.h"
 
 #include <algorithm>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -36,7 +37,7 @@ std::string markTitle(const PageMark& mark)
 
 } // namespace
 
-std::shared_ptr<ui::ViewController> makeNoteAlert(const PageMark& mark)
+std::shared_ptr<kit::ViewController> makeNoteAlert(const PageMark& mark)
 {
     return messageAlert(markTitle(mark), mark.text);
 }
@@ -307,7 +308,7 @@ void PreviewEditor::fillIn(const FormField& field)
 void PreviewEditor::choose(const FormField& field)
 {
     const auto sheet =
-        std::make_shared<ui::AlertController>(fieldName(field), std::string(), ui::AlertStyle::ActionSheet);
+        std::make_shared<kit::AlertController>(fieldName(field), std::string(), kit::AlertStyle::ActionSheet);
     const std::weak_ptr<PreviewEditor> weak = weak_from_this();
     const auto applying = [weak](const PageEdit& edit) {
         return [weak, edit] {
@@ -322,11 +323,11 @@ void PreviewEditor::choose(const FormField& field)
         if (!isChosen || !field.takesSeveral)
             chosen.push_back(i);
         std::ranges::sort(chosen);
-        sheet->addAction(alertAction((isChosen ? "✓ " : "") + field.options[i], ui::AlertActionStyle::Default,
-            applying(FieldChoiceEdit{field.page, field.id, chosen})));
+        sheet->addAction(alertAction((isChosen ? "✓ " : "") + field.options[i],
+            kit::AlertActionStyle::Default, applying(FieldChoiceEdit{field.page, field.id, chosen})));
     }
     if (field.takesOtherWords)
-        sheet->addAction(alertAction(localized("Other…"), ui::AlertActionStyle::Default, [weak, field] {
+        sheet->addAction(alertAction(localized("Other…"), kit::AlertActionStyle::Default, [weak, field] {
             const auto editor = weak.lock();
             if (!editor)
                 return;
@@ -335,8 +336,8 @@ void PreviewEditor::choose(const FormField& field)
                     asked->apply(FieldTextEdit{field.page, field.id, text});
             });
         }));
-    sheet->addAction(alertAction(localized("Cancel"), ui::AlertActionStyle::Cancel));
-    sheet->setPopoverAnchor(ui::ViewAnchor{_fieldBar->button(), _fieldBar->button()->bounds()});
+    sheet->addAction(alertAction(localized("Cancel"), kit::AlertActionStyle::Cancel));
+    sheet->setPopoverAnchor(kit::ViewAnchor{_fieldBar->button(), _fieldBar->button()->bounds()});
     _callbacks.present(sheet);
 }
 
@@ -379,11 +380,11 @@ void PreviewEditor::placeNote(const PreviewPagesView::PagePlace& place)
 void PreviewEditor::askForText(
     const std::string& title, const std::string& text, std::function<void(const std::string&)> written)
 {
-    const auto alert = std::make_shared<ui::AlertController>(title, std::string(), ui::AlertStyle::Alert);
+    const auto alert = std::make_shared<kit::AlertController>(title, std::string(), kit::AlertStyle::Alert);
     const auto screen = std::make_shared<NoteScreen>(title, text);
     alert->setContentViewController(screen);
-    alert->addAction(alertAction(localized("Cancel"), ui::AlertActionStyle::Cancel));
-    const auto done = alertAction(localized("Done"), ui::AlertActionStyle::Default,
+    alert->addAction(alertAction(localized("Cancel"), kit::AlertActionStyle::Cancel));
+    const auto done = alertAction(localized("Done"), kit::AlertActionStyle::Default,
         [note = screen->note(), written = std::move(written)] { written(note->text()); });
     alert->addAction(done);
     _callbacks.present(alert);
@@ -398,9 +399,9 @@ void PreviewEditor::showMark(std::size_t page, const PageMark& mark)
     }
     const std::weak_ptr<PreviewEditor> weak = weak_from_this();
     const auto alert =
-        std::make_shared<ui::AlertController>(markTitle(mark), mark.text, ui::AlertStyle::Alert);
+        std::make_shared<kit::AlertController>(markTitle(mark), mark.text, kit::AlertStyle::Alert);
     alert->addAction(alertAction(mark.text.empty() ? localized("Add Comment") : localized("Change Text"),
-        ui::AlertActionStyle::Default, [weak, page, mark] {
+        kit::AlertActionStyle::Default, [weak, page, mark] {
             const auto editor = weak.lock();
             if (!editor)
                 return;
@@ -409,12 +410,12 @@ void PreviewEditor::showMark(std::size_t page, const PageMark& mark)
                     asked->apply(MarkTextEdit{page, mark.id, text});
             });
         }));
-    alert->addAction(alertAction(localized("Remove"), ui::AlertActionStyle::Destructive, [weak, page, mark] {
+    alert->addAction(alertAction(localized("Remove"), kit::AlertActionStyle::Destructive, [weak, page, mark] {
         if (const auto editor = weak.lock())
             editor->apply(MarkRemoval{page, mark.id});
     }));
-    alert->addAction(alertAction(localized("Cancel"), ui::AlertActionStyle::Cancel));
+    alert->addAction(alertAction(localized("Cancel"), kit::AlertActionStyle::Cancel));
     _callbacks.present(alert);
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -11,11 +11,11 @@
 #include <memory>
 #include <string>
 
-namespace platform::ui {
+namespace kit {
 class ViewController;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 class PreviewFieldBar;
 
@@ -24,7 +24,7 @@ class PreviewFieldBar;
 class PreviewEditor : public std::enable_shared_from_this<PreviewEditor> {
 public:
     struct Callbacks {
-        std::function<void(const std::shared_ptr<ui::ViewController>&)> present; ///< an alert
+        std::function<void(const std::shared_ptr<kit::ViewController>&)> present; ///< an alert
         std::function<void()> layoutDidChange; ///< the bar of a field came or went
         std::function<void()> done; ///< the person is ready
     };
@@ -78,6 +78,6 @@ private:
 };
 
 /// Shows a note that somebody has written, to be read.
-std::shared_ptr<ui::ViewController> makeNoteAlert(const PageMark& mark);
+std::shared_ptr<kit::ViewController> makeNoteAlert(const PageMark& mark);
 
-} // namespace platform::components
+} // namespace screens

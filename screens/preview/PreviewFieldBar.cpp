@@ -10,7 +10,7 @@
 #include <algorithm>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -66,17 +66,17 @@ std::shared_ptr<PreviewFieldBar> PreviewFieldBar::create()
 void PreviewFieldBar::build()
 {
     const auto self = std::static_pointer_cast<PreviewFieldBar>(shared_from_this());
-    _name = std::make_shared<ui::Label>();
-    _name->setFont(ui::Font::preferred(ui::TextStyle::Footnote));
-    _text = std::make_shared<ui::TextField>();
-    _text->setInputTraits({.returnKey = ui::ReturnKey::Done, .clearButton = ui::ClearButton::WhileEditing});
-    _text->setDelegate(std::shared_ptr<ui::TextFieldDelegate>(self, self.get()));
-    _button = std::make_shared<ui::Button>(std::string(), [weak = std::weak_ptr(self)] {
+    _name = std::make_shared<kit::Label>();
+    _name->setFont(kit::Font::preferred(kit::TextStyle::Footnote));
+    _text = std::make_shared<kit::TextField>();
+    _text->setInputTraits({.returnKey = kit::ReturnKey::Done, .clearButton = kit::ClearButton::WhileEditing});
+    _text->setDelegate(std::shared_ptr<kit::TextFieldDelegate>(self, self.get()));
+    _button = std::make_shared<kit::Button>(std::string(), [weak = std::weak_ptr(self)] {
         const auto bar = weak.lock();
         if (const auto call = bar ? bar->_onPress : nullptr)
             call();
     });
-    for (const auto& part : std::initializer_list<std::shared_ptr<ui::View>>{_name, _text, _button})
+    for (const auto& part : std::initializer_list<std::shared_ptr<kit::View>>{_name, _text, _button})
         addSubview(part);
 }
 
@@ -108,14 +108,14 @@ std::optional<std::string> PreviewFieldBar::takeText()
     return _field->text;
 }
 
-bool PreviewFieldBar::textFieldShouldReturn(ui::TextField&)
+bool PreviewFieldBar::textFieldShouldReturn(kit::TextField&)
 {
     if (const auto call = _onNext)
         call();
     return true;
 }
 
-void PreviewFieldBar::textFieldDidEndEditing(ui::TextField&)
+void PreviewFieldBar::textFieldDidEndEditing(kit::TextField&)
 {
     if (const auto call = _onLeave)
         call();
@@ -130,4 +130,4 @@ void PreviewFieldBar::layoutSubviews()
     _button->setFrame(below);
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -21,7 +21,7 @@
 #include <system_error>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -199,7 +199,7 @@ PreviewContent readContent(const Url& url, const AttributeMap& values, const Rea
 PreviewLimits previewLimitsForMainScreen()
 {
     PreviewLimits limits;
-    const auto& screen = ui::Screen::main();
+    const auto& screen = kit::Screen::main();
     if (!screen)
         return limits;
     limits.imageScale = screen->scale;
@@ -211,7 +211,7 @@ PreviewLimits previewLimitsForMainScreen()
 PreviewLimits previewLimitsForCloseLook()
 {
     PreviewLimits limits;
-    if (const auto& screen = ui::Screen::main())
+    if (const auto& screen = kit::Screen::main())
         limits.imageScale = screen->scale;
     constexpr int longestSide = 32'000;
     limits.maxImageWidth = limits.maxImageHeight = longestSide;
@@ -237,4 +237,4 @@ PreviewContent loadPreview(
     return refused ? failure(summary(url, {}), errorWords(*refused)) : content;
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -4,12 +4,13 @@
 #pragma once
 
 #include "platform/Url.h"
+#include "screens/PlatformNames.h"
 #include "screens/preview/PreviewContent.h"
 
 #include <cstddef>
 #include <functional>
 
-namespace platform::components {
+namespace screens {
 
 /// How much of a document a preview reads.
 struct PreviewLimits {
@@ -31,4 +32,4 @@ PreviewLimits previewLimitsForCloseLook();
 PreviewContent loadPreview(
     const Url& url, const PreviewLimits& limits, const std::function<bool()>& isCancelled = {});
 
-} // namespace platform::components
+} // namespace screens

@@ -5,7 +5,7 @@
 
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 void PreviewMediaView::setMedia(Content content)
 {
@@ -13,4 +13,4 @@ void PreviewMediaView::setMedia(Content content)
     native().notify([](auto& native) { native.previewContentDidChange(); });
 }
 
-} // namespace platform::components
+} // namespace screens

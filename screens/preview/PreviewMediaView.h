@@ -7,7 +7,7 @@
 
 #include <string>
 
-namespace platform::components {
+namespace screens {
 
 /// Sound or a film in the platform's player, with its controls. It plays when the person starts it and stops
 /// when it is no longer seen.
@@ -33,4 +33,4 @@ private:
     Content _content;
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -9,7 +9,7 @@
 #include <iterator>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -140,4 +140,4 @@ void PreviewPagesView::setPlacing(bool placing)
     stateDidChange();
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -9,7 +9,7 @@
 #include <algorithm>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -340,4 +340,4 @@ std::string PreviewPagesView::selectedText() const
     return text;
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -5,6 +5,7 @@
 
 #include "platform/PagedDocument.h"
 #include "platform/PagedDocumentEditing.h"
+#include "screens/PlatformNames.h"
 #include "screens/preview/PageDeck.h"
 #include "screens/preview/PreviewView.h"
 
@@ -19,7 +20,7 @@ namespace platform {
 class Queue;
 } // namespace platform
 
-namespace platform::components {
+namespace screens {
 
 /// A document of pages to scroll through. Pages are drawn one at a time on a queue of the view's own, those
 /// that are seen first; work for a document that is no longer shown is dropped. "Content" points are those of
@@ -150,4 +151,4 @@ private:
     std::function<void()> _onUndo;
 };
 
-} // namespace platform::components
+} // namespace screens

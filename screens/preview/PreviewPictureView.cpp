@@ -5,7 +5,7 @@
 
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 void PreviewPictureView::setPicture(Picture picture)
 {
@@ -26,4 +26,4 @@ void PreviewPictureView::userSeesPixels(double width)
         call();
 }
 
-} // namespace platform::components
+} // namespace screens

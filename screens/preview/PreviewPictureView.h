@@ -4,11 +4,12 @@
 #pragma once
 
 #include "platform/ImageLoader.h"
+#include "screens/PlatformNames.h"
 #include "screens/preview/PreviewView.h"
 
 #include <functional>
 
-namespace platform::components {
+namespace screens {
 
 /// A picture that fits its window at first and can be zoomed and moved.
 class PreviewPictureView : public PreviewView {
@@ -37,4 +38,4 @@ private:
     std::function<void()> _onNeedsPixels;
 };
 
-} // namespace platform::components
+} // namespace screens

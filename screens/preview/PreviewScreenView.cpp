@@ -11,7 +11,7 @@
 
 #include <algorithm>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -32,10 +32,10 @@ void PreviewScreenView::build()
     _searchBar->setHidden(true);
     _toolbar = PreviewToolbar::create();
     _toolbar->setHidden(true);
-    _note = std::make_shared<ui::Label>();
-    _note->setFont(ui::Font::preferred(ui::TextStyle::Footnote));
-    _note->setAlignment(ui::TextAlignment::Center);
-    _note->setTextColor(ui::StandardColors::gray);
+    _note = std::make_shared<kit::Label>();
+    _note->setFont(kit::Font::preferred(kit::TextStyle::Footnote));
+    _note->setAlignment(kit::TextAlignment::Center);
+    _note->setTextColor(kit::StandardColors::gray);
     _note->setHidden(true);
     addSubview(_searchBar);
     addSubview(_note);
@@ -65,7 +65,7 @@ void PreviewScreenView::setSearching(bool searching)
     setNeedsLayout();
 }
 
-void PreviewScreenView::setContent(const std::shared_ptr<ui::View>& content)
+void PreviewScreenView::setContent(const std::shared_ptr<kit::View>& content)
 {
     if (content == _content)
         return;
@@ -79,7 +79,7 @@ void PreviewScreenView::setContent(const std::shared_ptr<ui::View>& content)
 }
 
 void PreviewScreenView::setEditBars(
-    const std::shared_ptr<ui::View>& bar, const std::shared_ptr<ui::View>& barAbove)
+    const std::shared_ptr<kit::View>& bar, const std::shared_ptr<kit::View>& barAbove)
 {
     for (const auto& before : {_editBar, _barAbove}) {
         if (before)
@@ -98,11 +98,11 @@ void PreviewScreenView::layoutSubviews()
 {
     const double width = bounds().width, height = bounds().height;
     double top = 0, bottom = height;
-    const auto placeAbove = [&](ui::View& view, double viewHeight) {
+    const auto placeAbove = [&](kit::View& view, double viewHeight) {
         view.setFrame({0, top, width, viewHeight});
         top += view.isHidden() ? 0 : viewHeight;
     };
-    const auto placeBelow = [&](ui::View& view, double viewHeight) {
+    const auto placeBelow = [&](kit::View& view, double viewHeight) {
         view.setFrame({0, bottom - viewHeight, width, viewHeight});
         bottom -= view.isHidden() ? 0 : viewHeight;
     };
@@ -121,4 +121,4 @@ void PreviewScreenView::layoutSubviews()
         _content->setFrame({0, top, width, std::max(0.0, bottom - top)});
 }
 
-} // namespace platform::components
+} // namespace screens

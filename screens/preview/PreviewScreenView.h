@@ -8,28 +8,28 @@
 #include <memory>
 #include <string>
 
-namespace platform::ui {
+namespace kit {
 class Label;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 class PreviewSearchBar;
 class PreviewToolbar;
 
 /// The whole of a preview's screen: search bar, a note on what is left out, the content, the toolbar, from
 /// top to bottom. Main thread only.
-class PreviewScreenView : public ui::View {
+class PreviewScreenView : public kit::View {
 public:
     static std::shared_ptr<PreviewScreenView> create();
-    using ui::View::View;
+    using kit::View::View;
 
     const std::shared_ptr<PreviewSearchBar>& searchBar() const { return _searchBar; }
     const std::shared_ptr<PreviewToolbar>& toolbar() const { return _toolbar; }
     /// Bars that stand below the content in place of the toolbar; null: none. A hidden one takes no room.
-    void setEditBars(const std::shared_ptr<ui::View>& bar, const std::shared_ptr<ui::View>& barAbove);
-    const std::shared_ptr<ui::View>& content() const { return _content; }
-    void setContent(const std::shared_ptr<ui::View>& content); ///< null: none
+    void setEditBars(const std::shared_ptr<kit::View>& bar, const std::shared_ptr<kit::View>& barAbove);
+    const std::shared_ptr<kit::View>& content() const { return _content; }
+    void setContent(const std::shared_ptr<kit::View>& content); ///< null: none
     const std::string& note() const;
     void setNote(const std::string& note); ///< empty: none
     bool isSearching() const;
@@ -42,8 +42,8 @@ private:
 
     std::shared_ptr<PreviewSearchBar> _searchBar;
     std::shared_ptr<PreviewToolbar> _toolbar;
-    std::shared_ptr<ui::Label> _note;
-    std::shared_ptr<ui::View> _content, _editBar, _barAbove;
+    std::shared_ptr<kit::Label> _note;
+    std::shared_ptr<kit::View> _content, _editBar, _barAbove;
 };
 
-} // namespace platform::components
+} // namespace screens

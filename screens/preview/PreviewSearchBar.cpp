@@ -9,13 +9,14 @@
 #include "platform/Dispatch.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
+#include "screens/PlatformNames.h"
 #include "screens/preview/PreviewView.h"
 
 #include <algorithm>
 #include <chrono>
 #include <initializer_list>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -23,10 +24,10 @@ namespace {
 constexpr auto typingPause = std::chrono::milliseconds(150);
 constexpr double margin = 6, buttonSide = 44, countWidth = 76;
 
-std::shared_ptr<ui::Button> symbolButton(
+std::shared_ptr<kit::Button> symbolButton(
     const char* icon, const std::string& label, std::function<void()> action)
 {
-    const auto button = std::make_shared<ui::Button>(std::string(), std::move(action));
+    const auto button = std::make_shared<kit::Button>(std::string(), std::move(action));
     button->setImage(Image::named(icon));
     button->setAccessibilityLabel(label);
     return button;
@@ -52,22 +53,22 @@ void PreviewSearchBar::build()
                 preview->showMatch(direction);
         };
     };
-    _field = std::make_shared<ui::TextField>();
+    _field = std::make_shared<kit::TextField>();
     _field->setPlaceholder(localized("Search in document"));
     _field->setAccessibilityLabel(localized("Search in document"));
-    _field->setInputTraits({.returnKey = ui::ReturnKey::Search,
+    _field->setInputTraits({.returnKey = kit::ReturnKey::Search,
         .returnKeyNeedsText = false,
-        .capitalization = ui::Capitalization::None,
-        .autocorrection = ui::Autocorrection::Off,
-        .clearButton = ui::ClearButton::WhileEditing});
-    _field->setDelegate(std::shared_ptr<ui::TextFieldDelegate>(self, self.get()));
+        .capitalization = kit::Capitalization::None,
+        .autocorrection = kit::Autocorrection::Off,
+        .clearButton = kit::ClearButton::WhileEditing});
+    _field->setDelegate(std::shared_ptr<kit::TextFieldDelegate>(self, self.get()));
     _field->setOnEditingChanged([weak] {
         if (const auto bar = weak.lock())
             bar->edited();
     });
-    _count = std::make_shared<ui::Label>();
-    _count->setFont(ui::Font::preferred(ui::TextStyle::Footnote));
-    _count->setAlignment(ui::TextAlignment::Center);
+    _count = std::make_shared<kit::Label>();
+    _count->setFont(kit::Font::preferred(kit::TextStyle::Footnote));
+    _count->setAlignment(kit::TextAlignment::Center);
     _previous = symbolButton("go-up-symbolic", localized("Previous match"), step(MatchStep::Previous));
     _next = symbolButton("go-down-symbolic", localized("Next match"), step(MatchStep::Next));
     _close = symbolButton("window-close-symbolic", localized("End search"), [weak] {
@@ -76,7 +77,7 @@ void PreviewSearchBar::build()
             call();
     });
     for (const auto& part :
-        std::initializer_list<std::shared_ptr<ui::View>>{_field, _count, _previous, _next, _close})
+        std::initializer_list<std::shared_ptr<kit::View>>{_field, _count, _previous, _next, _close})
         addSubview(part);
     update();
 }
@@ -93,7 +94,7 @@ void PreviewSearchBar::edited()
     });
 }
 
-bool PreviewSearchBar::textFieldShouldReturn(ui::TextField& field)
+bool PreviewSearchBar::textFieldShouldReturn(kit::TextField& field)
 {
     const auto preview = _preview.lock();
     if (!preview)
@@ -135,9 +136,9 @@ void PreviewSearchBar::update()
 void PreviewSearchBar::layoutSubviews()
 {
     const double width = bounds().width;
-    const bool isMirrored = traits().layoutDirection == ui::LayoutDirection::RightToLeft;
+    const bool isMirrored = traits().layoutDirection == kit::LayoutDirection::RightToLeft;
     double x = margin;
-    const auto place = [&](ui::View& view, double itemWidth, double inset) {
+    const auto place = [&](kit::View& view, double itemWidth, double inset) {
         view.setFrame({isMirrored ? width - x - itemWidth : x, inset, itemWidth, barHeight - 2 * inset});
         x += itemWidth;
     };
@@ -148,4 +149,4 @@ void PreviewSearchBar::layoutSubviews()
         place(*button, buttonSide, 2);
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -10,24 +10,24 @@
 #include <memory>
 #include <string>
 
-namespace platform::ui {
+namespace kit {
 class Button;
 class Label;
 class TextField;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 class PreviewView;
 
 /// The bar above a previewed document in which its text is searched: the field, how many matches there are,
 /// the one before and the one after. Main thread only.
-class PreviewSearchBar : public ui::View, private ui::TextFieldDelegate {
+class PreviewSearchBar : public kit::View, private kit::TextFieldDelegate {
 public:
     static constexpr double barHeight = 48; ///< points
 
     static std::shared_ptr<PreviewSearchBar> create();
-    using ui::View::View;
+    using kit::View::View;
 
     void setOnClose(std::function<void()> callback) { _onClose = std::move(callback); }
     /// Searches this view from now on; null: nothing.
@@ -35,11 +35,11 @@ public:
     /// Shows the state of the search anew.
     void update();
 
-    const std::shared_ptr<ui::TextField>& field() const { return _field; }
-    const std::shared_ptr<ui::Label>& countLabel() const { return _count; }
-    const std::shared_ptr<ui::Button>& previousButton() const { return _previous; }
-    const std::shared_ptr<ui::Button>& nextButton() const { return _next; }
-    const std::shared_ptr<ui::Button>& closeButton() const { return _close; }
+    const std::shared_ptr<kit::TextField>& field() const { return _field; }
+    const std::shared_ptr<kit::Label>& countLabel() const { return _count; }
+    const std::shared_ptr<kit::Button>& previousButton() const { return _previous; }
+    const std::shared_ptr<kit::Button>& nextButton() const { return _next; }
+    const std::shared_ptr<kit::Button>& closeButton() const { return _close; }
 
     void layoutSubviews() override;
 
@@ -47,14 +47,14 @@ private:
     void build();
     void edited();
     std::string countText() const;
-    bool textFieldShouldReturn(ui::TextField& field) override;
+    bool textFieldShouldReturn(kit::TextField& field) override;
 
     std::weak_ptr<PreviewView> _preview;
-    std::shared_ptr<ui::TextField> _field;
-    std::shared_ptr<ui::Label> _count;
-    std::shared_ptr<ui::Button> _previous, _next, _close;
+    std::shared_ptr<kit::TextField> _field;
+    std::shared_ptr<kit::Label> _count;
+    std::shared_ptr<kit::Button> _previous, _next, _close;
     std::function<void()> _onClose;
     unsigned _edits = 0;
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -9,11 +9,12 @@
 #include "kit/views/ImageView.h"
 #include "kit/views/Label.h"
 #include "kit/views/StackView.h"
+#include "screens/PlatformNames.h"
 
 #include <algorithm>
 #include <initializer_list>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -22,26 +23,26 @@ constexpr double lineSpacing = 12;
 constexpr double symbolAlpha = 0.5; ///< of a plain symbol, which only goes with the words
 constexpr double buttonHeight = 48, buttonWidth = 200;
 
-std::shared_ptr<ui::Label> makeLabel(const ui::Font& font)
+std::shared_ptr<kit::Label> makeLabel(const kit::Font& font)
 {
-    const auto label = std::make_shared<ui::Label>();
+    const auto label = std::make_shared<kit::Label>();
     label->setFont(font);
     label->setMaxLines(0);
-    label->setLineBreak(ui::LineBreak::WordWrap);
-    label->setAlignment(ui::TextAlignment::Center);
+    label->setLineBreak(kit::LineBreak::WordWrap);
+    label->setAlignment(kit::TextAlignment::Center);
     return label;
 }
 
-void show(ui::Label& label, const std::string& text)
+void show(kit::Label& label, const std::string& text)
 {
     label.setText(text);
     label.setHidden(text.empty());
 }
 
-std::shared_ptr<ui::View> rounded(const Color& color)
+std::shared_ptr<kit::View> rounded(const Color& color)
 {
-    const auto view = std::make_shared<ui::View>();
-    ui::ViewStyle style;
+    const auto view = std::make_shared<kit::View>();
+    kit::ViewStyle style;
     style.background = color;
     style.cornerRadius = PreviewSummaryView::barHeight / 2;
     view->setStyle(style);
@@ -59,25 +60,25 @@ std::shared_ptr<PreviewSummaryView> PreviewSummaryView::create()
 
 void PreviewSummaryView::build()
 {
-    _spinner = std::make_shared<ui::ActivityIndicator>();
-    _icon = std::make_shared<ui::ImageView>();
-    _icon->setContentMode(ui::ContentMode::AspectFit);
+    _spinner = std::make_shared<kit::ActivityIndicator>();
+    _icon = std::make_shared<kit::ImageView>();
+    _icon->setContentMode(kit::ContentMode::AspectFit);
     _icon->setAccessibility({.label = {}, .hint = {}, .isHidden = true});
-    _title = makeLabel(ui::Font::preferred(ui::TextStyle::Title2).bold());
-    _message = makeLabel(ui::Font::preferred(ui::TextStyle::Body));
-    _message->setTextColor(ui::StandardColors::gray);
-    _bar = rounded(ui::StandardColors::hairline);
-    _filled = rounded(ui::StandardColors::tint);
+    _title = makeLabel(kit::Font::preferred(kit::TextStyle::Title2).bold());
+    _message = makeLabel(kit::Font::preferred(kit::TextStyle::Body));
+    _message->setTextColor(kit::StandardColors::gray);
+    _bar = rounded(kit::StandardColors::hairline);
+    _filled = rounded(kit::StandardColors::tint);
     _bar->addSubview(_filled);
-    _stack = std::make_shared<ui::StackView>(ui::Axis::Vertical);
+    _stack = std::make_shared<kit::StackView>(kit::Axis::Vertical);
     for (const auto& part :
-        std::initializer_list<std::shared_ptr<ui::View>>{_spinner, _icon, _title, _message, _bar})
+        std::initializer_list<std::shared_ptr<kit::View>>{_spinner, _icon, _title, _message, _bar})
         _stack->addArrangedSubview(part);
-    _stack->setStackAlignment(ui::StackAlignment::Center);
+    _stack->setStackAlignment(kit::StackAlignment::Center);
     _stack->setSpacing(lineSpacing);
     _stack->setPlacedByFrame(false);
     addSubview(_stack);
-    ui::LayoutConstraint::activate({
+    kit::LayoutConstraint::activate({
         _stack->centerXAnchor().equalTo(centerXAnchor()),
         _stack->centerYAnchor().equalTo(centerYAnchor()),
         _stack->widthAnchor().lessThanOrEqualTo(widthAnchor(), -2 * margin),
@@ -112,7 +113,7 @@ void PreviewSummaryView::showProgress()
 {
     _bar->setHidden(!_content.progress);
     const double done = std::clamp(_content.progress.value_or(0), 0.0, 1.0) * barWidth;
-    const bool fromRight = traits().layoutDirection == ui::LayoutDirection::RightToLeft;
+    const bool fromRight = traits().layoutDirection == kit::LayoutDirection::RightToLeft;
     _filled->setFrame({fromRight ? barWidth - done : 0, 0, done, barHeight});
 }
 
@@ -122,15 +123,15 @@ void PreviewSummaryView::setActions(const std::vector<Action>& actions)
         button->removeFromSuperview();
     _buttons.clear();
     for (const auto& action : actions) {
-        const auto button = std::make_shared<ui::Button>(action.title, action.run);
+        const auto button = std::make_shared<kit::Button>(action.title, action.run);
         if (action.isSuggested)
-            button->setButtonStyle(ui::ButtonStyle::Suggested);
+            button->setButtonStyle(kit::ButtonStyle::Suggested);
         _buttons.push_back(button);
         _stack->addArrangedSubview(button);
-        ui::LayoutConstraint::activate({button->heightAnchor().equalToConstant(buttonHeight),
+        kit::LayoutConstraint::activate({button->heightAnchor().equalToConstant(buttonHeight),
             button->widthAnchor().greaterThanOrEqualToConstant(buttonWidth)});
     }
     setNeedsLayout();
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -11,19 +11,19 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 class ActivityIndicator;
 class Button;
 class ImageView;
 class Label;
 class StackView;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 /// What a preview shows in place of a document's content: its icon and name, what it is or what is the
 /// matter, how far a download has come, and what can be done. Main thread only.
-class PreviewSummaryView : public ui::View {
+class PreviewSummaryView : public kit::View {
 public:
     struct Action {
         std::string title;
@@ -43,11 +43,11 @@ public:
     static constexpr double iconSide = 96; ///< points
     static constexpr double barWidth = 240, barHeight = 6; ///< points
 
-    using ui::View::View;
+    using kit::View::View;
 
     const Content& content() const { return _content; }
     void setContent(const Content& content);
-    const std::vector<std::shared_ptr<ui::Button>>& buttons() const { return _buttons; }
+    const std::vector<std::shared_ptr<kit::Button>>& buttons() const { return _buttons; }
     /// The buttons below the text, the first one on top.
     void setActions(const std::vector<Action>& actions);
 
@@ -56,12 +56,12 @@ private:
     void showProgress();
 
     Content _content;
-    std::shared_ptr<ui::StackView> _stack;
-    std::shared_ptr<ui::ActivityIndicator> _spinner;
-    std::shared_ptr<ui::ImageView> _icon;
-    std::shared_ptr<ui::Label> _title, _message;
-    std::shared_ptr<ui::View> _bar, _filled;
-    std::vector<std::shared_ptr<ui::Button>> _buttons;
+    std::shared_ptr<kit::StackView> _stack;
+    std::shared_ptr<kit::ActivityIndicator> _spinner;
+    std::shared_ptr<kit::ImageView> _icon;
+    std::shared_ptr<kit::Label> _title, _message;
+    std::shared_ptr<kit::View> _bar, _filled;
+    std::vector<std::shared_ptr<kit::Button>> _buttons;
 };
 
-} // namespace platform::components
+} // namespace screens

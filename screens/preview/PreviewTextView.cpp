@@ -5,7 +5,7 @@
 
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 void PreviewTextView::setText(Content content)
 {
@@ -13,4 +13,4 @@ void PreviewTextView::setText(Content content)
     native().notify([](auto& native) { native.previewContentDidChange(); });
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -7,7 +7,7 @@
 
 #include <string>
 
-namespace platform::components {
+namespace screens {
 
 /// A text to read, select and search. Zooming makes the letters larger.
 class PreviewTextView : public PreviewView {
@@ -34,4 +34,4 @@ private:
     Content _content;
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -6,15 +6,16 @@
 #include "kit/views/Button.h"
 #include "kit/views/Label.h"
 #include "platform/Localization.h"
+#include "screens/PlatformNames.h"
 #include "screens/preview/PreviewPagesView.h"
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
-std::shared_ptr<ui::Button> symbolButton(const char* icon, const std::string& label)
+std::shared_ptr<kit::Button> symbolButton(const char* icon, const std::string& label)
 {
-    const auto button = std::make_shared<ui::Button>();
+    const auto button = std::make_shared<kit::Button>();
     button->setImage(Image::named(icon));
     button->setAccessibilityLabel(label);
     return button;
@@ -36,11 +37,11 @@ void PreviewToolbar::build()
     _edit = symbolButton("document-edit-symbolic", localized("Edit document"));
     _zoomOut = symbolButton("zoom-out-symbolic", localized("Smaller"));
     _zoomIn = symbolButton("zoom-in-symbolic", localized("Larger"));
-    _page = std::make_shared<ui::Label>();
-    _page->setFont(ui::Font::preferred(ui::TextStyle::Footnote));
-    _page->setAlignment(ui::TextAlignment::Center);
+    _page = std::make_shared<kit::Label>();
+    _page->setFont(kit::Font::preferred(kit::TextStyle::Footnote));
+    _page->setAlignment(kit::TextAlignment::Center);
     for (const auto& part :
-        std::initializer_list<std::shared_ptr<ui::View>>{_find, _copy, _page, _edit, _zoomOut, _zoomIn})
+        std::initializer_list<std::shared_ptr<kit::View>>{_find, _copy, _page, _edit, _zoomOut, _zoomIn})
         addSubview(part);
     const auto self = std::static_pointer_cast<PreviewToolbar>(shared_from_this());
     const auto act = [weak = std::weak_ptr(self)](auto action) {
@@ -120,8 +121,8 @@ void PreviewToolbar::update()
 void PreviewToolbar::layoutSubviews()
 {
     const double width = bounds().width;
-    const bool isMirrored = traits().layoutDirection == ui::LayoutDirection::RightToLeft;
-    const auto place = [&](ui::View& view, double x, double itemWidth) {
+    const bool isMirrored = traits().layoutDirection == kit::LayoutDirection::RightToLeft;
+    const auto place = [&](kit::View& view, double x, double itemWidth) {
         view.setFrame({isMirrored ? width - x - itemWidth : x, 0, itemWidth, barHeight});
     };
     place(*_find, 0, barHeight);
@@ -133,4 +134,4 @@ void PreviewToolbar::layoutSubviews()
     place(*_zoomIn, width - barHeight, barHeight);
 }
 
-} // namespace platform::components
+} // namespace screens

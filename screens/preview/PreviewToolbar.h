@@ -10,23 +10,23 @@
 #include <string>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 class Button;
 class Label;
-} // namespace platform::ui
+} // namespace kit
 
-namespace platform::components {
+namespace screens {
 
 class PreviewView;
 
 /// The bar below a previewed document: search, the page, smaller and larger, as far as the document has them.
 /// Main thread only.
-class PreviewToolbar : public ui::View {
+class PreviewToolbar : public kit::View {
 public:
     static constexpr double barHeight = 48; ///< points; also a button's side
 
     static std::shared_ptr<PreviewToolbar> create();
-    using ui::View::View;
+    using kit::View::View;
 
     void setOnFind(std::function<void()> callback) { _onFind = std::move(callback); }
     void setOnEdit(std::function<void()> callback) { _onEdit = std::move(callback); }
@@ -38,15 +38,15 @@ public:
     void update();
     bool isEmpty() const; ///< there is nothing to press
 
-    const std::shared_ptr<ui::Button>& findButton() const { return _find; }
-    const std::shared_ptr<ui::Button>& copyButton() const
+    const std::shared_ptr<kit::Button>& findButton() const { return _find; }
+    const std::shared_ptr<kit::Button>& copyButton() const
     {
         return _copy;
     } ///< shown while something is selected
-    const std::shared_ptr<ui::Button>& editButton() const { return _edit; }
-    const std::shared_ptr<ui::Button>& zoomOutButton() const { return _zoomOut; }
-    const std::shared_ptr<ui::Button>& zoomInButton() const { return _zoomIn; }
-    const std::shared_ptr<ui::Label>& pageLabel() const { return _page; }
+    const std::shared_ptr<kit::Button>& editButton() const { return _edit; }
+    const std::shared_ptr<kit::Button>& zoomOutButton() const { return _zoomOut; }
+    const std::shared_ptr<kit::Button>& zoomInButton() const { return _zoomIn; }
+    const std::shared_ptr<kit::Label>& pageLabel() const { return _page; }
 
     void layoutSubviews() override;
 
@@ -56,10 +56,10 @@ private:
     std::string pageText() const;
 
     std::weak_ptr<PreviewView> _preview;
-    std::shared_ptr<ui::Button> _find, _copy, _edit, _zoomOut, _zoomIn;
-    std::shared_ptr<ui::Label> _page;
+    std::shared_ptr<kit::Button> _find, _copy, _edit, _zoomOut, _zoomIn;
+    std::shared_ptr<kit::Label> _page;
     std::function<void()> _onFind, _onEdit;
     bool _canEdit = false;
 };
 
-} // namespace platform::components
+} // namespace screens

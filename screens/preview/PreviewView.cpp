@@ -6,7 +6,7 @@
 #include <algorithm>
 #include <utility>
 
-namespace platform::components {
+namespace screens {
 
 void PreviewView::setZoom(double zoom)
 {
@@ -82,4 +82,4 @@ void PreviewView::stateDidChange()
         call();
 }
 
-} // namespace platform::components
+} // namespace screens

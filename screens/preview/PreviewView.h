@@ -6,13 +6,14 @@
 #include "kit/values/ObserverSlot.h"
 #include "kit/views/HostedView.h"
 #include "platform/Geometry.h"
+#include "screens/PlatformNames.h"
 
 #include <cstddef>
 #include <functional>
 #include <memory>
 #include <string>
 
-namespace platform::components {
+namespace screens {
 
 enum class MatchStep { Next, Previous };
 
@@ -42,9 +43,9 @@ public:
 /// The view of a document's content, with what its toolbar and keys act on. The host makes the native view by
 /// the kind. A new content of the same kind is put into the same view, which keeps place, zoom and search.
 /// Main thread only.
-class PreviewView : public ui::HostedView {
+class PreviewView : public kit::HostedView {
 public:
-    using ui::HostedView::HostedView;
+    using kit::HostedView::HostedView;
 
     void setPreviewObserver(std::weak_ptr<PreviewViewObserver> observer) { _native.set(std::move(observer)); }
 
@@ -82,11 +83,11 @@ public:
 
 protected:
     virtual void queryDidChange() { }
-    const ui::ObserverSlot<PreviewViewObserver>& native() const { return _native; }
+    const kit::ObserverSlot<PreviewViewObserver>& native() const { return _native; }
     void stateDidChange();
 
 private:
-    ui::ObserverSlot<PreviewViewObserver> _native;
+    kit::ObserverSlot<PreviewViewObserver> _native;
     double _zoom = minZoom;
     std::string _query;
     SearchState _search;
@@ -94,4 +95,4 @@ private:
     std::function<void(const std::string&)> _onFailure;
 };
 
-} // namespace platform::components
+} // namespace screens

@@ -8,7 +8,7 @@
 #include "screens/preview/PreviewPictureView.h"
 #include "screens/preview/PreviewTextView.h"
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -69,4 +69,4 @@ std::shared_ptr<PreviewView> previewViewFor(
     return view;
 }
 
-} // namespace platform::components
+} // namespace screens

@@ -7,7 +7,7 @@
 
 #include <memory>
 
-namespace platform::components {
+namespace screens {
 
 class PreviewView;
 
@@ -16,4 +16,4 @@ class PreviewView;
 std::shared_ptr<PreviewView> previewViewFor(
     const PreviewContent& content, const std::shared_ptr<PreviewView>& before);
 
-} // namespace platform::components
+} // namespace screens

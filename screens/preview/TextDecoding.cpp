@@ -9,7 +9,7 @@
 #include <cstdint>
 #include <optional>
 
-namespace platform::components {
+namespace screens {
 
 namespace {
 
@@ -191,4 +191,4 @@ std::string withoutLongLines(const std::string& text, std::size_t maxLineBytes)
     return cut;
 }
 
-} // namespace platform::components
+} // namespace screens

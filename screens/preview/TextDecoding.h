@@ -4,12 +4,13 @@
 #pragma once
 
 #include "platform/TextDecoder.h"
+#include "screens/PlatformNames.h"
 
 #include <cstddef>
 #include <string>
 #include <string_view>
 
-namespace platform::components {
+namespace screens {
 
 /// The text of a document as UTF-8, by its byte-order mark (UTF-8, UTF-16 or UTF-32 of either order), as
 /// UTF-16 without a mark where every other byte is NUL, else as UTF-8 where it is well-formed, else as
@@ -21,4 +22,4 @@ std::string decodedText(std::string_view bytes, TextEnd end, const TextDecoder& 
 /// The text with every line that is longer than so many bytes cut at a character, and an ellipsis put there.
 std::string withoutLongLines(const std::string& text, std::size_t maxLineBytes);
 
-} // namespace platform::components
+} // namespace screens

@@ -80,10 +80,10 @@ protected:
     {
         return platform::services().keyedArchiver().archive(value);
     }
-    std::shared_ptr<platform::ui::SearchPresentation> searchAfterDelay()
+    std::shared_ptr<kit::SearchPresentation> searchAfterDelay()
     {
         dispatch->advance(0.8);
-        return std::dynamic_pointer_cast<platform::ui::SearchPresentation>(
+        return std::dynamic_pointer_cast<kit::SearchPresentation>(
             browser->presentedViewController());
     }
 
@@ -352,7 +352,7 @@ TEST_F(AppDelegateTest, WithoutTheBrowserNothingIsLedAnywhere)
 {
     write("note.txt");
     launchApplication();
-    app->rootWindow()->setRootViewController(std::make_shared<platform::ui::ViewController>());
+    app->rootWindow()->setRootViewController(std::make_shared<kit::ViewController>());
     EXPECT_FALSE(open(schemeURL("note.txt")));
     choose(platform::ShortcutTypeSearch);
     EXPECT_TRUE(goOn(platform::activityType::queryContinuation,

@@ -16,8 +16,8 @@ namespace {
 using namespace testing_support;
 using platform::Notification;
 using platform::PropertyValue;
-using platform::components::DocumentListController;
-using platform::components::UnavailableScreen;
+using screens::DocumentListController;
+using screens::UnavailableScreen;
 using testing::Each;
 using testing::ElementsAre;
 

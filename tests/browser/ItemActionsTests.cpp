@@ -23,7 +23,7 @@ namespace {
 
 using namespace testing_support;
 using platform::Url;
-using platform::components::DocumentListAction;
+using screens::DocumentListAction;
 using testing::ElementsAre;
 
 class ItemActionsTest : public BrowserFixture {
@@ -235,7 +235,7 @@ TEST_F(ItemActionsTest, EditModeOffersItsButtonsByTheSelection)
     const auto titles = [this] {
         std::vector<std::string> found;
         for (const auto& item : topList()->toolbarItems()) {
-            const auto button = std::dynamic_pointer_cast<platform::ui::Button>(item->customView());
+            const auto button = std::dynamic_pointer_cast<kit::Button>(item->customView());
             found.push_back(button ? button->title() : item->isSpace() ? "-" : "status");
         }
         return found;
@@ -254,14 +254,14 @@ TEST_F(ItemActionsTest, EditModeOffersItsButtonsByTheSelection)
         EXPECT_EQ(browser->barButtonDeleteItem()->isEnabled(), row.isOffered) << row.selected.size();
     }
     topList()->setSelectedItems({a});
-    const auto press = [](const std::shared_ptr<platform::ui::BarButtonItem>& item) {
-        std::dynamic_pointer_cast<platform::ui::Button>(item->customView())->press();
+    const auto press = [](const std::shared_ptr<kit::BarButtonItem>& item) {
+        std::dynamic_pointer_cast<kit::Button>(item->customView())->press();
     };
     press(browser->barButtonNewFolder());
     EXPECT_EQ(takeAlert(), "New Folder");
     press(browser->barButtonDeleteItem());
     ASSERT_NE(alert(), nullptr);
-    EXPECT_EQ(std::get<std::weak_ptr<platform::ui::BarButtonItem>>(alert()->popoverAnchor()).lock(),
+    EXPECT_EQ(std::get<std::weak_ptr<kit::BarButtonItem>>(alert()->popoverAnchor()).lock(),
         browser->barButtonDeleteItem());
     alert()->userCancelled();
     EXPECT_TRUE(browser->editMode()) << "nothing happened";
@@ -285,10 +285,10 @@ TEST_F(ItemActionsTest, ItemsMoveToTheFolderThatIsChosen)
     browser->showMoveTargetForSelectedItems(nullptr);
     EXPECT_FALSE(browser->editMode());
     const auto picker =
-        std::dynamic_pointer_cast<platform::components::MoveTargetPicker>(browser->presentedViewController());
+        std::dynamic_pointer_cast<screens::MoveTargetPicker>(browser->presentedViewController());
     ASSERT_NE(picker, nullptr);
     EXPECT_THAT(picker->itemsToMove(), ElementsAre(a, b));
-    EXPECT_EQ(picker->presentationStyle(), platform::ui::PresentationStyle::OverCurrentContext);
+    EXPECT_EQ(picker->presentationStyle(), kit::PresentationStyle::OverCurrentContext);
     EXPECT_EQ(log->count("INFO Prompting for Move Target, 2 items"), 1);
     browser->documentTargetSelectionControllerDidSelectItemAtURL(picker, url("Folder"));
     EXPECT_TRUE(isThere("Folder/a.txt"));
@@ -321,12 +321,12 @@ TEST_F(ItemActionsTest, TheShareSheetPointsAtTheMiddleOfItsView)
     drive.writeReference("a.txt.trwref", "BrindleDefault", "Folder/a.txt");
     const auto recipes = drive.makeContainer("app.recipes");
     launch();
-    const auto view = std::make_shared<platform::ui::View>(platform::Rect{0, 0, 300, 60});
+    const auto view = std::make_shared<kit::View>(platform::Rect{0, 0, 300, 60});
     browser->showDICUrlCompletion(view, url("a.txt.trwref"), {});
     EXPECT_EQ(browser->documentInteractionController()->url(), target);
     EXPECT_EQ(log->count("INFO URL resolved to " + logText(target)), 1);
     ASSERT_NE(alert(), nullptr);
-    const auto* place = std::get_if<platform::ui::ViewAnchor>(&alert()->popoverAnchor());
+    const auto* place = std::get_if<kit::ViewAnchor>(&alert()->popoverAnchor());
     ASSERT_NE(place, nullptr);
     EXPECT_EQ(place->view.lock(), view);
     EXPECT_EQ(place->rect, (platform::Rect{0, 30, 300, 0}));

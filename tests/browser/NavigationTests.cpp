@@ -26,9 +26,9 @@ namespace {
 
 using namespace testing_support;
 using platform::Url;
-using platform::components::DocumentListAction;
-using platform::components::DocumentListController;
-using platform::ui::SearchPresentation;
+using screens::DocumentListAction;
+using screens::DocumentListController;
+using kit::SearchPresentation;
 using testing::ElementsAre;
 
 constexpr auto top = "BrindleDefault";

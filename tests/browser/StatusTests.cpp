@@ -25,7 +25,7 @@ class StatusTest : public BrowserFixture {
 protected:
     DriveStatusLabelView& view(std::size_t index = 0) const
     {
-        const auto list = std::dynamic_pointer_cast<platform::components::DocumentListController>(
+        const auto list = std::dynamic_pointer_cast<screens::DocumentListController>(
             browser->viewControllers().at(index));
         return *statusBar(*list)->labelsView();
     }

@@ -25,23 +25,23 @@ namespace {
 
 using namespace testing_support;
 using platform::Url;
-using platform::components::MoveTargetPicker;
+using screens::MoveTargetPicker;
 using testing::ElementsAre;
 
 constexpr auto top = "BrindleDefault";
 
 /// Shows every movement until it is told that it ends.
-class SlowScreen : public platform::ui::NavigationObserver {
+class SlowScreen : public kit::NavigationObserver {
 public:
-    void navigationWillTransition(platform::ui::NavigationController&,
-        const platform::ui::NavigationTransition&, platform::ui::TransitionToken token) override
+    void navigationWillTransition(kit::NavigationController&,
+        const kit::NavigationTransition&, kit::TransitionToken token) override
     {
         movement = std::move(token);
     }
-    void stackDidChange(platform::ui::NavigationController&) override { }
-    void toolbarVisibilityDidChange(platform::ui::NavigationController&, bool) override { }
+    void stackDidChange(kit::NavigationController&) override { }
+    void toolbarVisibilityDidChange(kit::NavigationController&, bool) override { }
 
-    platform::ui::TransitionToken movement;
+    kit::TransitionToken movement;
 };
 
 /// Entries from outside that come in the middle of something.
@@ -113,7 +113,7 @@ TEST_F(WarpTest, ADocumentThatIsTappedWhileItsListMovesInKeepsItsManager)
     const std::function<void()> ways[] = {[&] { open(note); }, [&] { warp("Folder/note.txt"); }};
     for (const auto& way : ways) {
         browser->documentListControllerDidSelectContainerWithViewController(
-            topList(), platform::components::DocumentListController::initWithURL(url("Folder")));
+            topList(), screens::DocumentListController::initWithURL(url("Folder")));
         EXPECT_TRUE(browser->isTransitioning());
         way();
         settle();
@@ -148,7 +148,7 @@ TEST_F(WarpTest, ThePreviewedDocumentIsShownAnew)
 
 TEST_F(WarpTest, APreviewThatCannotShowADocumentOffersOtherApps)
 {
-    using platform::components::PreviewSummaryView;
+    using screens::PreviewSummaryView;
     const auto document = write("Folder/data.bin");
     launch();
     EXPECT_TRUE(warp("Folder/data.bin"));
@@ -209,7 +209,7 @@ TEST_F(WarpTest, ASearchResultIsPreviewedWhereTheSearchWas)
     launch();
     topList()->startSearchWithQueryStringBecomeFirstResponder("note", true);
     settle();
-    ASSERT_NE(std::dynamic_pointer_cast<platform::ui::SearchPresentation>(browser->presentedViewController()),
+    ASSERT_NE(std::dynamic_pointer_cast<kit::SearchPresentation>(browser->presentedViewController()),
         nullptr);
     open(note);
     EXPECT_EQ(browser->presentedViewController(), nullptr);

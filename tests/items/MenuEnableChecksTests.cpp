@@ -14,7 +14,7 @@ namespace tarrow {
 namespace {
 
 using items_tests::ItemsFixture;
-using platform::components::DocumentListController;
+using screens::DocumentListController;
 using List = std::shared_ptr<DocumentListController>;
 
 class MenuEnableChecksTest : public ItemsFixture {

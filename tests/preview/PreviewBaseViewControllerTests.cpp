@@ -16,31 +16,31 @@
 
 using namespace platform;
 using namespace tarrow;
-using platform::ui::SystemItem;
+using kit::SystemItem;
 using testing::ElementsAre;
 
 namespace {
 
-constexpr ui::TraitCollection phone{ui::SizeClass::Compact, ui::SizeClass::Regular};
-constexpr ui::TraitCollection lying{ui::SizeClass::Compact, ui::SizeClass::Compact};
-constexpr ui::TraitCollection tablet{ui::SizeClass::Regular, ui::SizeClass::Regular};
+constexpr kit::TraitCollection phone{kit::SizeClass::Compact, kit::SizeClass::Regular};
+constexpr kit::TraitCollection lying{kit::SizeClass::Compact, kit::SizeClass::Compact};
+constexpr kit::TraitCollection tablet{kit::SizeClass::Regular, kit::SizeClass::Regular};
 
 /// A screen with a button that opens the item elsewhere.
 class ScreenWithButton : public PreviewBaseViewController {
 public:
-    std::shared_ptr<ui::Button> openInAppNavControllerButton() override { return button; }
-    std::shared_ptr<ui::Button> button;
+    std::shared_ptr<kit::Button> openInAppNavControllerButton() override { return button; }
+    std::shared_ptr<kit::Button> button;
 };
 
 class Base : public testing_support::PreviewFixture {
 protected:
     Base() { resize({360, 640}, phone); }
-    ~Base() override { ui::Screen::setMain(std::nullopt); }
+    ~Base() override { kit::Screen::setMain(std::nullopt); }
 
-    void resize(Size size, const ui::TraitCollection& traits,
-        ui::UserInterfaceIdiom idiom = ui::UserInterfaceIdiom::Phone)
+    void resize(Size size, const kit::TraitCollection& traits,
+        kit::UserInterfaceIdiom idiom = kit::UserInterfaceIdiom::Phone)
     {
-        ui::Screen::setMain(ui::Screen{{0, 0, size.width, size.height}, 1, idiom, {0, 0, size.width, 20}});
+        kit::Screen::setMain(kit::Screen{{0, 0, size.width, size.height}, 1, idiom, {0, 0, size.width, 20}});
         window->resized(size, traits);
         window->layoutIfNeeded();
     }
@@ -53,7 +53,7 @@ protected:
         window->layoutIfNeeded();
         return screen;
     }
-    static std::vector<SystemItem> symbols(const ui::BarButtonItems& items)
+    static std::vector<SystemItem> symbols(const kit::BarButtonItems& items)
     {
         std::vector<SystemItem> found;
         for (const auto& item : items)
@@ -84,7 +84,7 @@ TEST_F(Base, OnlyAnUprightScreenHasABottomMargin)
     struct Row {
         const char* what;
         Size size;
-        ui::TraitCollection traits;
+        kit::TraitCollection traits;
         int orientation;
         double margin;
     };
@@ -113,7 +113,7 @@ TEST_F(Base, APhoneHasItsButtonsBelowAndATabletAbove)
     EXPECT_TRUE(screen->navigationItem().rightItems().empty());
     const auto first = screen->barButtonActionItem();
 
-    resize({1024, 768}, tablet, ui::UserInterfaceIdiom::Tablet);
+    resize({1024, 768}, tablet, kit::UserInterfaceIdiom::Tablet);
     EXPECT_THAT(symbols(screen->navigationItem().rightItems()),
         ElementsAre(SystemItem::Action, SystemItem::FixedSpace, SystemItem::Trash, SystemItem::FixedSpace,
             SystemItem::Organize));
@@ -155,7 +155,7 @@ TEST_F(Base, NothingCanBeDoneWithoutAnItem)
 TEST_F(Base, TheOpenButtonStandsInAPhonesBar)
 {
     const auto screen = std::make_shared<ScreenWithButton>();
-    screen->button = std::make_shared<ui::Button>("Open");
+    screen->button = std::make_shared<kit::Button>("Open");
     screen->setItemManager(manager);
     manager->setItemUpdatePreview(document("Notes.txt"), false);
     navigation->pushViewController(screen, false);
@@ -178,7 +178,7 @@ TEST_F(Base, SharesTheDocumentThatTheItemStandsFor)
     const auto sheet = manager->documentInteractionController();
     ASSERT_TRUE(sheet);
     EXPECT_EQ(sheet->url(), drive.url("Notes.txt"));
-    EXPECT_TRUE(std::dynamic_pointer_cast<ui::AlertController>(navigation->presentedViewController()));
+    EXPECT_TRUE(std::dynamic_pointer_cast<kit::AlertController>(navigation->presentedViewController()));
     navigation->dismissViewController(false);
 
     const auto nowhere = document("Other.txt");
@@ -193,9 +193,9 @@ TEST_F(Base, TheDeleteQuestionPointsAtItsButton)
 {
     const auto screen = show(document("Notes.txt"));
     EXPECT_TRUE(screen->barButtonDeleteItem()->press());
-    const auto alert = std::dynamic_pointer_cast<ui::AlertController>(navigation->presentedViewController());
+    const auto alert = std::dynamic_pointer_cast<kit::AlertController>(navigation->presentedViewController());
     ASSERT_TRUE(alert);
-    const auto* anchor = std::get_if<std::weak_ptr<ui::BarButtonItem>>(&alert->popoverAnchor());
+    const auto* anchor = std::get_if<std::weak_ptr<kit::BarButtonItem>>(&alert->popoverAnchor());
     ASSERT_TRUE(anchor);
     EXPECT_EQ(anchor->lock(), screen->barButtonDeleteItem());
 }

@@ -29,8 +29,8 @@ namespace {
 namespace fs = std::filesystem;
 
 using namespace platform;
-using namespace platform::components;
-using platform::ui::AlertController;
+using namespace screens;
+using kit::AlertController;
 using tarrow::DRItem;
 using testing::HasSubstr;
 using testing::IsEmpty;

@@ -41,7 +41,7 @@ protected:
     {
         std::vector<std::string> names;
         for (const auto& screen : navigation->viewControllers()) {
-            const auto list = std::dynamic_pointer_cast<platform::components::DocumentListController>(screen);
+            const auto list = std::dynamic_pointer_cast<screens::DocumentListController>(screen);
             const bool isDetails =
                 std::dynamic_pointer_cast<tarrow::PreviewDetailsViewController>(screen) != nullptr;
             names.push_back(list        ? list->presentedURL()->lastPathComponent()
@@ -52,11 +52,11 @@ protected:
         return names;
     }
 
-    std::shared_ptr<platform::ui::NavigationController> navigation =
-        std::make_shared<platform::ui::NavigationController>();
-    std::shared_ptr<platform::ui::ViewController> base = std::make_shared<platform::ui::ViewController>();
-    std::shared_ptr<platform::ui::Window> window =
-        std::make_shared<platform::ui::Window>(platform::Rect{0, 0, 360, 640});
+    std::shared_ptr<kit::NavigationController> navigation =
+        std::make_shared<kit::NavigationController>();
+    std::shared_ptr<kit::ViewController> base = std::make_shared<kit::ViewController>();
+    std::shared_ptr<kit::Window> window =
+        std::make_shared<kit::Window>(platform::Rect{0, 0, 360, 640});
     std::shared_ptr<tarrow::PreviewItemManager> manager =
         tarrow::PreviewItemManager::newItemManagerWithModeNavController(tarrow::PreviewModeQuick, navigation);
     std::shared_ptr<tarrow::LookwellItemController> preview =

@@ -13,8 +13,8 @@
 
 using namespace platform;
 using namespace tarrow;
-using platform::components::DocumentListController;
-using platform::components::PreviewContent;
+using screens::DocumentListController;
+using screens::PreviewContent;
 
 namespace {
 
@@ -68,12 +68,12 @@ TEST_F(Manager, IsRegisteredForTheItemThatIsShownWhileTheApplicationIsActive)
 
 TEST_F(Manager, DismissesASearchBeforeItShowsThePreview)
 {
-    base->presentViewController(std::make_shared<ui::SearchPresentation>(), false);
+    base->presentViewController(std::make_shared<kit::SearchPresentation>(), false);
     manager->previewItem(document("First.txt"));
     EXPECT_FALSE(navigation->presentedViewController());
     EXPECT_EQ(stack(), (Names{"-", "*"}));
 
-    base->presentViewController(std::make_shared<ui::ViewController>(), false);
+    base->presentViewController(std::make_shared<kit::ViewController>(), false);
     manager->previewItem(document("Second.txt"));
     EXPECT_TRUE(navigation->presentedViewController());
 }
@@ -88,7 +88,7 @@ TEST_F(Manager, LeadsTheStackToAnotherPlace)
     EXPECT_EQ(manager->item()->url(), drive.url("Documents/Trip/Map.txt"));
     EXPECT_TRUE(manager->filePresenterRegistered());
 
-    base->presentViewController(std::make_shared<ui::ViewController>(), false);
+    base->presentViewController(std::make_shared<kit::ViewController>(), false);
     EXPECT_TRUE(manager->warpToNewURL(drive.url("Documents")));
     EXPECT_EQ(stack(), (Names{topName, "Documents"}));
     EXPECT_FALSE(manager->filePresenterRegistered());

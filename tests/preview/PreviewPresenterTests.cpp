@@ -18,8 +18,8 @@
 
 using namespace platform;
 using namespace tarrow;
-using platform::components::MoveTargetPicker;
-using platform::ui::AlertController;
+using screens::MoveTargetPicker;
+using kit::AlertController;
 using testing::ElementsAre;
 using testing::HasSubstr;
 
@@ -197,7 +197,7 @@ TEST_F(Presenter, ClosesForAnItemThatIsDeleted)
 TEST_F(Presenter, TakesNoOtherScreenAway)
 {
     const auto prepared = document("Notes.txt");
-    const auto below = std::make_shared<ui::ViewController>();
+    const auto below = std::make_shared<kit::ViewController>();
     navigation->pushViewController(below, false);
     manager->prepareToPreviewItem(prepared);
     drive.settle();
@@ -353,7 +353,7 @@ TEST_F(Presenter, MovesToTheChosenFolder)
         const auto picker =
             std::dynamic_pointer_cast<MoveTargetPicker>(navigation->presentedViewController());
         ASSERT_TRUE(picker);
-        EXPECT_EQ(picker->presentationStyle(), ui::PresentationStyle::OverCurrentContext);
+        EXPECT_EQ(picker->presentationStyle(), kit::PresentationStyle::OverCurrentContext);
         EXPECT_EQ(picker->itemsToMove(), std::vector{manager->item()->url()});
         picker->choose(folder);
         EXPECT_FALSE(std::dynamic_pointer_cast<MoveTargetPicker>(navigation->presentedViewController()));

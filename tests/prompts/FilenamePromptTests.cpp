@@ -19,10 +19,10 @@
 namespace tarrow {
 namespace {
 
-using platform::ui::AlertActionStyle;
-using platform::ui::TextField;
-using platform::ui::TextRange;
-using platform::ui::ViewController;
+using kit::AlertActionStyle;
+using kit::TextField;
+using kit::TextRange;
+using kit::ViewController;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
@@ -79,10 +79,10 @@ protected:
 
     std::shared_ptr<testing_support::RecordingLog> log = testing_support::RecordingLog::install();
     std::shared_ptr<ViewController> root = std::make_shared<ViewController>();
-    std::shared_ptr<platform::ui::Window> window =
-        std::make_shared<platform::ui::Window>(platform::Rect{0, 0, 400, 800});
+    std::shared_ptr<kit::Window> window =
+        std::make_shared<kit::Window>(platform::Rect{0, 0, 400, 800});
     std::shared_ptr<FilenamePrompt> prompt;
-    std::shared_ptr<platform::ui::AlertController> alert;
+    std::shared_ptr<kit::AlertController> alert;
     std::vector<std::string> confirmed;
     bool accepts = false;
     std::string refusal = "Name is already taken";

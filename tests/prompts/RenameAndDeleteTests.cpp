@@ -21,8 +21,8 @@ using namespace testing_support;
 using platform::Error;
 using platform::FileErrorCode;
 using platform::Url;
-using platform::ui::AlertActionStyle;
-using platform::ui::AlertController;
+using kit::AlertActionStyle;
+using kit::AlertController;
 
 class RenameAndDeleteTest : public testing::Test, protected DriveFixture {
 protected:
@@ -37,8 +37,8 @@ protected:
     {
         return std::dynamic_pointer_cast<AlertController>(root->presentedViewController());
     }
-    void askToDelete(const std::vector<Url>& items, const std::shared_ptr<platform::ui::View>& view = nullptr,
-        const std::shared_ptr<platform::ui::BarButtonItem>& button = nullptr)
+    void askToDelete(const std::vector<Url>& items, const std::shared_ptr<kit::View>& view = nullptr,
+        const std::shared_ptr<kit::BarButtonItem>& button = nullptr)
     {
         UIUtils::showDeleteWarningAlertHasContainerViewControllerUsingViewUsingButtonCompletion(
             items, false, root, view, button, [this](const auto& pressed, bool cancelled) {
@@ -47,9 +47,9 @@ protected:
             });
     }
 
-    std::shared_ptr<platform::ui::ViewController> root = std::make_shared<platform::ui::ViewController>();
-    std::shared_ptr<platform::ui::Window> window =
-        std::make_shared<platform::ui::Window>(platform::Rect{0, 0, 400, 800});
+    std::shared_ptr<kit::ViewController> root = std::make_shared<kit::ViewController>();
+    std::shared_ptr<kit::Window> window =
+        std::make_shared<kit::Window>(platform::Rect{0, 0, 400, 800});
     std::vector<std::string> answers;
 };
 
@@ -184,7 +184,7 @@ TEST_F(RenameAndDeleteTest, TheSheetAsksOnce)
     for (const std::size_t action : {0U, 1U}) {
         askToDelete({budget});
         ASSERT_NE(alert(), nullptr);
-        EXPECT_EQ(alert()->alertStyle(), platform::ui::AlertStyle::ActionSheet);
+        EXPECT_EQ(alert()->alertStyle(), kit::AlertStyle::ActionSheet);
         EXPECT_EQ(alert()->title(), "");
         ASSERT_EQ(alert()->actions().size(), 2);
         EXPECT_EQ(alert()->actions()[0]->style(), AlertActionStyle::Destructive);
@@ -202,16 +202,16 @@ TEST_F(RenameAndDeleteTest, TheSheetAsksOnce)
 
 TEST_F(RenameAndDeleteTest, TheSheetPointsAtWhatAskedForIt)
 {
-    using platform::ui::BarButtonItem;
+    using kit::BarButtonItem;
     const auto budget = writeDocument("Budget");
-    const auto view = std::make_shared<platform::ui::View>(platform::Rect{10, 20, 200, 60});
+    const auto view = std::make_shared<kit::View>(platform::Rect{10, 20, 200, 60});
     const auto button = std::make_shared<BarButtonItem>("Delete", nullptr);
     askToDelete({budget}, view, button);
-    const auto* place = std::get_if<platform::ui::ViewAnchor>(&alert()->popoverAnchor());
+    const auto* place = std::get_if<kit::ViewAnchor>(&alert()->popoverAnchor());
     ASSERT_NE(place, nullptr);
     EXPECT_EQ(place->view.lock(), view);
     EXPECT_EQ(place->rect, (platform::Rect{0, 30, 200, 0}));
-    EXPECT_EQ(place->arrows, platform::ui::ArrowDirections::LeftOrRight);
+    EXPECT_EQ(place->arrows, kit::ArrowDirections::LeftOrRight);
     alert()->userCancelled();
 
     askToDelete({budget}, nullptr, button);

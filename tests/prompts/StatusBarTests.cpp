@@ -21,8 +21,8 @@ namespace tarrow {
 namespace {
 
 using namespace testing_support;
-using platform::components::DocumentListController;
-using platform::ui::SystemItem;
+using screens::DocumentListController;
+using kit::SystemItem;
 
 struct CountingDelegate : DocumentListControllerStatusBarDelegate {
     int presses = 0;
@@ -37,20 +37,20 @@ protected:
         set.storageOfferManager = offers;
         set.localization = std::make_shared<PlainTexts>();
         platform::installServices(std::move(set));
-        platform::ui::Screen screen;
+        kit::Screen screen;
         screen.scale = 2;
-        platform::ui::Screen::setMain(screen);
+        kit::Screen::setMain(screen);
         bar->createStatusBarButtonPressDelegate(nullptr, delegate);
     }
     ~StatusBarTest() override
     {
-        platform::ui::Screen::setMain({});
+        kit::Screen::setMain({});
         platform::installServices({});
         platform::installLogSink(nullptr);
     }
 
     DriveStatusLabelView& view() { return *bar->labelsView(); }
-    platform::components::StorageUpgradeButton& button() { return *view().quotaButton(); }
+    screens::StorageUpgradeButton& button() { return *view().quotaButton(); }
     /// The frame of the line in a view of this size.
     platform::Rect lineIn(double width, double height)
     {
@@ -111,7 +111,7 @@ TEST_F(StatusBarTest, TheToolbarHoldsTheContentBetweenTwoSpaces)
     EXPECT_EQ(bar->toolbarItems()[0]->systemItem(), SystemItem::FlexibleSpace);
     EXPECT_EQ(bar->toolbarItems()[1]->customView(), bar->labelsView());
     EXPECT_EQ(bar->toolbarItems()[2]->systemItem(), SystemItem::FlexibleSpace);
-    EXPECT_EQ(view().primaryLabel()->font().sizing, platform::ui::TextSizing::Fixed);
+    EXPECT_EQ(view().primaryLabel()->font().sizing, kit::TextSizing::Fixed);
 }
 
 TEST_F(StatusBarTest, TheButtonFollowsTheOffer)

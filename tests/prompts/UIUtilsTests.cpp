@@ -17,8 +17,8 @@ namespace {
 using platform::Error;
 using platform::FileErrorCode;
 using platform::PropertyDictionary;
-using platform::ui::AlertController;
-using platform::ui::ViewController;
+using kit::AlertController;
+using kit::ViewController;
 
 class UIUtilsTest : public testing::Test {
 protected:
@@ -32,7 +32,7 @@ protected:
     }
     ~UIUtilsTest() override
     {
-        platform::ui::Screen::setMain({});
+        kit::Screen::setMain({});
         platform::installServices({});
     }
 
@@ -42,8 +42,8 @@ protected:
     }
 
     std::shared_ptr<ViewController> root = std::make_shared<ViewController>();
-    std::shared_ptr<platform::ui::Window> window =
-        std::make_shared<platform::ui::Window>(platform::Rect{0, 0, 400, 800});
+    std::shared_ptr<kit::Window> window =
+        std::make_shared<kit::Window>(platform::Rect{0, 0, 400, 800});
 };
 
 TEST_F(UIUtilsTest, WhatIsSaidAboutAnError)
@@ -88,22 +88,22 @@ TEST_F(UIUtilsTest, AMessageHasOneButtonAndMayLieOverAnother)
     UIUtils::showAlertMessageParentViewController("Title", "Message", root);
     UIUtils::showAlertMessageParentViewController("Second", "", root);
     ASSERT_EQ(window->presentedScreens().size(), 2);
-    EXPECT_EQ(alert()->alertStyle(), platform::ui::AlertStyle::Alert);
+    EXPECT_EQ(alert()->alertStyle(), kit::AlertStyle::Alert);
     ASSERT_EQ(alert()->actions().size(), 1);
     EXPECT_EQ(alert()->actions()[0]->title(), "OK");
-    EXPECT_EQ(alert()->actions()[0]->style(), platform::ui::AlertActionStyle::Default);
+    EXPECT_EQ(alert()->actions()[0]->style(), kit::AlertActionStyle::Default);
     UIUtils::showAlertMessageParentViewController("Nowhere", "", nullptr);
     EXPECT_EQ(window->presentedScreens().size(), 2);
 }
 
 TEST_F(UIUtilsTest, TabletsAreToldByTheirIdiom)
 {
-    using platform::ui::UserInterfaceIdiom;
+    using kit::UserInterfaceIdiom;
     EXPECT_FALSE(UIUtils::tabulaMode()) << "without a display";
-    platform::ui::Screen screen;
+    kit::Screen screen;
     for (const auto idiom : {UserInterfaceIdiom::Phone, UserInterfaceIdiom::Tablet}) {
         screen.idiom = idiom;
-        platform::ui::Screen::setMain(screen);
+        kit::Screen::setMain(screen);
         EXPECT_EQ(UIUtils::tabulaMode(), idiom == UserInterfaceIdiom::Tablet);
     }
 }

@@ -11,7 +11,7 @@
 #include <gmock/gmock.h>
 
 using namespace platform;
-using namespace platform::components;
+using namespace screens;
 using testing::ElementsAre;
 using testing::IsEmpty;
 using testing_support::ComponentsFixture;
@@ -40,9 +40,9 @@ protected:
         sheet->presentOptionsMenuFromRectInView(screen, {0, 0, 10, 0}, screen->view(), false);
         return titles();
     }
-    std::shared_ptr<ui::AlertController> alert() const
+    std::shared_ptr<kit::AlertController> alert() const
     {
-        return std::static_pointer_cast<ui::AlertController>(screen->presentedViewController());
+        return std::static_pointer_cast<kit::AlertController>(screen->presentedViewController());
     }
     Lines titles() const
     {
@@ -63,7 +63,7 @@ protected:
         FAIL() << title;
     }
 
-    std::shared_ptr<ui::ViewController> screen = std::make_shared<ui::ViewController>();
+    std::shared_ptr<kit::ViewController> screen = std::make_shared<kit::ViewController>();
     std::shared_ptr<DocumentInteractionSheet> sheet;
     std::shared_ptr<CountingSheetDelegate> told = std::make_shared<CountingSheetDelegate>();
 };

@@ -10,7 +10,7 @@
 #include <gmock/gmock.h>
 
 using namespace platform;
-using namespace platform::components;
+using namespace screens;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
@@ -31,13 +31,13 @@ protected:
         window->setRootViewController(root);
         window->makeKeyAndVisible();
     }
-    std::shared_ptr<ui::AlertController> alert() const
+    std::shared_ptr<kit::AlertController> alert() const
     {
-        return std::dynamic_pointer_cast<ui::AlertController>(root->presentedViewController());
+        return std::dynamic_pointer_cast<kit::AlertController>(root->presentedViewController());
     }
 
-    std::shared_ptr<ui::Window> window = std::make_shared<ui::Window>(Rect{0, 0, 360, 640});
-    std::shared_ptr<ui::ViewController> root = std::make_shared<ui::ViewController>();
+    std::shared_ptr<kit::Window> window = std::make_shared<kit::Window>(Rect{0, 0, 360, 640});
+    std::shared_ptr<kit::ViewController> root = std::make_shared<kit::ViewController>();
 };
 
 TEST_F(Storage, OffersAnUpgradeWhileStorageIsLow)

@@ -286,7 +286,7 @@ void GtkApplicationLoop::launch(std::optional<ShortcutItem> shortcut)
     }
     _windowHost = std::make_shared<GtkWindowHost>(_application.get(), size, _settings.previews);
     _windowHost->setOnShow([this](WindowPeer& window) { windowShown(window); });
-    platform::ui::WindowHost::install(_windowHost);
+    kit::WindowHost::install(_windowHost);
     _delegate = _makeDelegate();
     const platform::LaunchOptions options{shortcut};
     const bool remains = _delegate->applicationWillFinishLaunchingWithOptions(*this, options);
@@ -356,7 +356,7 @@ void GtkApplicationLoop::continueActivity(const UserActivity& activity)
 
 void GtkApplicationLoop::failedToContinue(const UserActivity& activity, const platform::Error& error)
 {
-    using namespace platform::ui;
+    using namespace kit;
     _delegate->applicationDidFailToContinueUserActivityWithTypeError(*this, activity.type, error);
     const auto model = windowPeer() ? windowPeer()->model() : nullptr;
     if (!model || !model->rootViewController())
@@ -396,7 +396,7 @@ void GtkApplicationLoop::restoreState()
     const auto model = window ? window->model() : nullptr;
     const auto root = model ? model->rootViewController() : nullptr;
     if (!interface.empty() && root && _delegate->applicationShouldRestoreApplicationState(*this, coder))
-        platform::ui::decodeInterfaceState(*root, interface);
+        kit::decodeInterfaceState(*root, interface);
 }
 
 void GtkApplicationLoop::saveState()
@@ -413,7 +413,7 @@ void GtkApplicationLoop::saveState()
     _stateFile.set(
         StateKey::application, allowed ? platform::PropertyValue(coder.values()) : platform::PropertyValue());
     _stateFile.set(StateKey::interface,
-        allowed ? platform::PropertyValue(platform::ui::encodeInterfaceState(*root))
+        allowed ? platform::PropertyValue(kit::encodeInterfaceState(*root))
                 : platform::PropertyValue());
 }
 

@@ -78,7 +78,7 @@ void CairoCanvas::strokeEllipse(const Rect& inscribedIn)
     stroke();
 }
 
-void CairoCanvas::fillPie(const platform::ui::Pie& pie)
+void CairoCanvas::fillPie(const kit::Pie& pie)
 {
     cairo_move_to(_cairo, pie.center.x, pie.center.y);
     cairo_arc(_cairo, pie.center.x, pie.center.y, pie.radius, pie.startAngle, pie.endAngle);
@@ -86,7 +86,7 @@ void CairoCanvas::fillPie(const platform::ui::Pie& pie)
     fill();
 }
 
-void CairoCanvas::strokeArc(const platform::ui::Pie& arc)
+void CairoCanvas::strokeArc(const kit::Pie& arc)
 {
     cairo_new_path(_cairo);
     cairo_arc(_cairo, arc.center.x, arc.center.y, arc.radius, arc.startAngle, arc.endAngle);
@@ -98,10 +98,10 @@ void CairoCanvas::drawImage(const platform::Image& image, const Rect& rect)
     ImagePaint::draw(_cairo, image, rect);
 }
 
-void CairoCanvas::drawText(std::string_view text, const platform::ui::Font& font, platform::Point origin)
+void CairoCanvas::drawText(std::string_view text, const kit::Font& font, platform::Point origin)
 {
     const auto layout = TextLayout::make(_theme.makePangoContext().get(), text,
-        TextLayout::attributes(_theme, font, nullptr), platform::ui::TextLimits());
+        TextLayout::attributes(_theme, font, nullptr), kit::TextLimits());
     use(_fill);
     const double baseline = static_cast<double>(pango_layout_get_baseline(layout.get())) / PANGO_SCALE;
     cairo_save(_cairo);

@@ -11,7 +11,7 @@
 namespace host::gtk {
 
 /// What a view draws into while its widget is painted.
-class CairoCanvas : public platform::ui::Canvas {
+class CairoCanvas : public kit::Canvas {
 public:
     CairoCanvas(cairo_t* cairo, const Theme& theme);
 
@@ -22,10 +22,10 @@ public:
     void strokeRect(const platform::Rect& rect) override;
     void fillEllipse(const platform::Rect& inscribedIn) override;
     void strokeEllipse(const platform::Rect& inscribedIn) override;
-    void fillPie(const platform::ui::Pie& pie) override;
-    void strokeArc(const platform::ui::Pie& arc) override;
+    void fillPie(const kit::Pie& pie) override;
+    void strokeArc(const kit::Pie& arc) override;
     void drawImage(const platform::Image& image, const platform::Rect& rect) override;
-    void drawText(std::string_view text, const platform::ui::Font& font, platform::Point origin) override;
+    void drawText(std::string_view text, const kit::Font& font, platform::Point origin) override;
 
 private:
     void fill();

@@ -11,7 +11,7 @@
 namespace host::gtk {
 
 using platform::Point;
-using platform::ui::GestureRecognizer;
+using kit::GestureRecognizer;
 
 namespace {
 
@@ -23,7 +23,7 @@ GestureRecognizer::Time now()
 
 } // namespace
 
-GestureFeed::GestureFeed(GtkWidget* widget, std::weak_ptr<platform::ui::View> view)
+GestureFeed::GestureFeed(GtkWidget* widget, std::weak_ptr<kit::View> view)
     : _widget(widget)
     , _drag(gtk_gesture_drag_new())
     , _rest(gtk_gesture_long_press_new())

@@ -11,27 +11,27 @@
 #include <functional>
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 class GestureRecognizer;
 class View;
-} // namespace platform::ui
+} // namespace kit
 
 namespace host::gtk {
 
 /// Hands what one finger or the first mouse button does on a widget to the recognisers of a view.
 class GestureFeed {
 public:
-    GestureFeed(GtkWidget* widget, std::weak_ptr<platform::ui::View> view);
+    GestureFeed(GtkWidget* widget, std::weak_ptr<kit::View> view);
     ~GestureFeed();
 
 private:
-    using Call = std::function<void(platform::ui::GestureRecognizer&)>;
+    using Call = std::function<void(kit::GestureRecognizer&)>;
     void tell(const Call& call) const;
     void dragged(double dx, double dy);
 
     GtkWidget* _widget;
     GtkGesture *_drag, *_rest;
-    std::weak_ptr<platform::ui::View> _view;
+    std::weak_ptr<kit::View> _view;
     platform::Point _start, _last;
     SignalConnections _connections;
 };

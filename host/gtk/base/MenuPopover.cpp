@@ -12,8 +12,6 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 namespace {
 
 constexpr int iconSize = 16;
@@ -50,12 +48,12 @@ void runLater(std::function<void()> handler)
         new std::function<void()>(std::move(handler)));
 }
 
-GtkWidget* makeEntry(const ui::MenuAction& action)
+GtkWidget* makeEntry(const kit::MenuAction& action)
 {
     auto* content = gtk_box_new(GTK_ORIENTATION_HORIZONTAL, 12);
-    if (action.mark != ui::MenuMark::None) {
+    if (action.mark != kit::MenuMark::None) {
         auto* check = gtk_image_new_from_icon_name("object-select-symbolic");
-        gtk_widget_set_opacity(check, action.mark == ui::MenuMark::On ? 1 : 0);
+        gtk_widget_set_opacity(check, action.mark == kit::MenuMark::On ? 1 : 0);
         gtk_box_append(GTK_BOX(content), check);
     }
     auto* title = gtk_label_new(action.title.c_str());
@@ -71,21 +69,21 @@ GtkWidget* makeEntry(const ui::MenuAction& action)
     gtk_button_set_child(GTK_BUTTON(entry), content);
     gtk_widget_add_css_class(entry, "flat");
     gtk_widget_add_css_class(entry, "menu-entry");
-    if (action.style == ui::MenuActionStyle::Destructive)
+    if (action.style == kit::MenuActionStyle::Destructive)
         gtk_widget_add_css_class(entry, "destructive");
     gtk_widget_set_sensitive(entry, action.enabled);
     gtk_accessible_update_property(
         GTK_ACCESSIBLE(entry), GTK_ACCESSIBLE_PROPERTY_LABEL, action.title.c_str(), -1);
-    if (action.mark != ui::MenuMark::None)
+    if (action.mark != kit::MenuMark::None)
         gtk_accessible_update_state(GTK_ACCESSIBLE(entry), GTK_ACCESSIBLE_STATE_PRESSED,
-            action.mark == ui::MenuMark::On ? GTK_ACCESSIBLE_TRISTATE_TRUE : GTK_ACCESSIBLE_TRISTATE_FALSE,
+            action.mark == kit::MenuMark::On ? GTK_ACCESSIBLE_TRISTATE_TRUE : GTK_ACCESSIBLE_TRISTATE_FALSE,
             -1);
     return entry;
 }
 
 } // namespace
 
-void showMenu(GtkWidget* parent, double x, double y, const ui::Menu& menu)
+void showMenu(GtkWidget* parent, double x, double y, const kit::Menu& menu)
 {
     if (menu.empty())
         return;

@@ -11,6 +11,6 @@ namespace host::gtk {
 
 /// Shows a context menu at a point of a widget. It ends by itself when it is closed; an entry's handler runs
 /// after that.
-void showMenu(GtkWidget* parent, double x, double y, const platform::ui::Menu& menu);
+void showMenu(GtkWidget* parent, double x, double y, const kit::Menu& menu);
 
 } // namespace host::gtk

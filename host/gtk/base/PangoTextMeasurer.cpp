@@ -10,9 +10,9 @@
 namespace host::gtk {
 
 using platform::Size;
-using platform::ui::Font;
-using platform::ui::FontMetrics;
-using platform::ui::TextLimits;
+using kit::Font;
+using kit::FontMetrics;
+using kit::TextLimits;
 
 namespace {
 
@@ -55,7 +55,7 @@ Size PangoTextMeasurer::measure(std::string_view text, const Font& font, const T
 }
 
 Size PangoTextMeasurer::measure(
-    const platform::ui::AttributedText& text, const Font& font, const TextLimits& limits) const
+    const kit::AttributedText& text, const Font& font, const TextLimits& limits) const
 {
     return sizeOf(TextLayout::make(
         context(), TextLayout::text(text), TextLayout::attributes(*_theme, text, font), limits)

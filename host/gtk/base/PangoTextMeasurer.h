@@ -11,15 +11,15 @@
 namespace host::gtk {
 
 /// Measures texts with the fonts that the labels are shown in.
-class PangoTextMeasurer : public platform::ui::TextMeasurer {
+class PangoTextMeasurer : public kit::TextMeasurer {
 public:
     explicit PangoTextMeasurer(std::shared_ptr<const Theme> theme);
 
-    platform::Size measure(std::string_view text, const platform::ui::Font& font,
-        const platform::ui::TextLimits& limits) const override;
-    platform::Size measure(const platform::ui::AttributedText& text, const platform::ui::Font& font,
-        const platform::ui::TextLimits& limits) const override;
-    platform::ui::FontMetrics metrics(const platform::ui::Font& font) const override;
+    platform::Size measure(std::string_view text, const kit::Font& font,
+        const kit::TextLimits& limits) const override;
+    platform::Size measure(const kit::AttributedText& text, const kit::Font& font,
+        const kit::TextLimits& limits) const override;
+    kit::FontMetrics metrics(const kit::Font& font) const override;
 
     /// The theme's fonts or its window have changed.
     void themeDidChange();

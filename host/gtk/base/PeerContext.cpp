@@ -15,37 +15,37 @@ PeerContext::PeerContext(std::shared_ptr<Theme> theme, std::shared_ptr<FrameSche
 {
 }
 
-void PeerContext::add(const platform::ui::View& view, ViewPeer& peer)
+void PeerContext::add(const kit::View& view, ViewPeer& peer)
 {
     _peers.insert_or_assign(&view, &peer);
 }
 
-void PeerContext::remove(const platform::ui::View& view, const ViewPeer& peer)
+void PeerContext::remove(const kit::View& view, const ViewPeer& peer)
 {
     const auto found = _peers.find(&view);
     if (found != _peers.end() && found->second == &peer)
         _peers.erase(found);
 }
 
-ViewPeer* PeerContext::peerOf(const platform::ui::View& view) const
+ViewPeer* PeerContext::peerOf(const kit::View& view) const
 {
     const auto found = _peers.find(&view);
     return found == _peers.end() ? nullptr : found->second;
 }
 
-void PeerContext::setWidget(const platform::ui::BarButtonItem& item, GtkWidget* widget)
+void PeerContext::setWidget(const kit::BarButtonItem& item, GtkWidget* widget)
 {
     _itemWidgets.insert_or_assign(&item, widget);
 }
 
-void PeerContext::removeWidget(const platform::ui::BarButtonItem& item, const GtkWidget* widget)
+void PeerContext::removeWidget(const kit::BarButtonItem& item, const GtkWidget* widget)
 {
     const auto found = _itemWidgets.find(&item);
     if (found != _itemWidgets.end() && found->second == widget)
         _itemWidgets.erase(found);
 }
 
-GtkWidget* PeerContext::widgetOf(const platform::ui::BarButtonItem& item) const
+GtkWidget* PeerContext::widgetOf(const kit::BarButtonItem& item) const
 {
     const auto found = _itemWidgets.find(&item);
     return found == _itemWidgets.end() ? nullptr : found->second;

@@ -16,11 +16,11 @@
 #include <string>
 #include <unordered_map>
 
-namespace platform::ui {
+namespace kit {
 class BarButtonItem;
 class HostedView;
 class View;
-} // namespace platform::ui
+} // namespace kit
 
 namespace host::gtk {
 
@@ -29,7 +29,7 @@ class ViewPeer;
 /// Makes the native widget of a hosted view and keeps it in step: called for each change of the settings with
 /// the widget of the call before, null at first.
 using HostedViewMaker =
-    std::function<ObjectRef<GtkWidget>(platform::ui::HostedView& view, GtkWidget* current)>;
+    std::function<ObjectRef<GtkWidget>(kit::HostedView& view, GtkWidget* current)>;
 
 /// What the peers of one window share: its theme, its frames, and who shows what. Main thread only.
 class PeerContext {
@@ -40,15 +40,15 @@ public:
     FrameScheduler& scheduler() const { return *_scheduler; }
     FirstList& firstList() { return _firstList; }
 
-    void add(const platform::ui::View& view, ViewPeer& peer);
-    void remove(const platform::ui::View& view, const ViewPeer& peer);
+    void add(const kit::View& view, ViewPeer& peer);
+    void remove(const kit::View& view, const ViewPeer& peer);
     /// The peer that shows a view; null: none.
-    ViewPeer* peerOf(const platform::ui::View& view) const;
+    ViewPeer* peerOf(const kit::View& view) const;
 
-    void setWidget(const platform::ui::BarButtonItem& item, GtkWidget* widget);
-    void removeWidget(const platform::ui::BarButtonItem& item, const GtkWidget* widget);
+    void setWidget(const kit::BarButtonItem& item, GtkWidget* widget);
+    void removeWidget(const kit::BarButtonItem& item, const GtkWidget* widget);
     /// The widget that shows an entry of a bar; null: none.
-    GtkWidget* widgetOf(const platform::ui::BarButtonItem& item) const;
+    GtkWidget* widgetOf(const kit::BarButtonItem& item) const;
 
     void setHostedViewMaker(const std::string& kind, HostedViewMaker maker);
     const HostedViewMaker* hostedViewMaker(const std::string& kind) const;
@@ -60,8 +60,8 @@ private:
     std::shared_ptr<Theme> _theme;
     std::shared_ptr<FrameScheduler> _scheduler;
     FirstList _firstList;
-    std::unordered_map<const platform::ui::View*, ViewPeer*> _peers;
-    std::unordered_map<const platform::ui::BarButtonItem*, GtkWidget*> _itemWidgets;
+    std::unordered_map<const kit::View*, ViewPeer*> _peers;
+    std::unordered_map<const kit::BarButtonItem*, GtkWidget*> _itemWidgets;
     std::map<std::string, HostedViewMaker> _makers;
 };
 

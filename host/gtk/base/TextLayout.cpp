@@ -12,9 +12,9 @@
 namespace host::gtk::TextLayout {
 
 using platform::Image;
-using platform::ui::AttributedText;
-using platform::ui::Font;
-using platform::ui::TextRun;
+using kit::AttributedText;
+using kit::Font;
+using kit::TextRun;
 
 namespace {
 
@@ -125,7 +125,7 @@ bool hasAttachments(const AttributedText& text)
 }
 
 ObjectRef<PangoLayout> make(PangoContext* context, std::string_view characters, Attributes attributes,
-    const platform::ui::TextLimits& limits)
+    const kit::TextLimits& limits)
 {
     auto layout = ObjectRef<PangoLayout>::adopt(pango_layout_new(context));
     pango_layout_set_text(layout.get(), characters.data(), static_cast<int>(characters.size()));

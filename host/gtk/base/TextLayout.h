@@ -21,16 +21,16 @@ namespace TextLayout {
 using Attributes = std::unique_ptr<PangoAttrList, decltype(&pango_attr_list_unref)>;
 
 /// Font and, when there is one, colour over a whole text.
-Attributes attributes(const Theme& theme, const platform::ui::Font& font, const platform::Color* color);
+Attributes attributes(const Theme& theme, const kit::Font& font, const platform::Color* color);
 /// Of a styled text whose pieces fall back on `font`. The byte offsets are those of `text(...)`.
 Attributes attributes(
-    const Theme& theme, const platform::ui::AttributedText& text, const platform::ui::Font& font);
+    const Theme& theme, const kit::AttributedText& text, const kit::Font& font);
 /// The characters, with one object replacement character for each image.
-std::string text(const platform::ui::AttributedText& text);
-bool hasAttachments(const platform::ui::AttributedText& text);
+std::string text(const kit::AttributedText& text);
+bool hasAttachments(const kit::AttributedText& text);
 
 ObjectRef<PangoLayout> make(PangoContext* context, std::string_view text, Attributes attributes,
-    const platform::ui::TextLimits& limits);
+    const kit::TextLimits& limits);
 /// Draws a layout with its images; the left end of the first line's top is at (0, 0).
 void draw(cairo_t* cairo, PangoLayout* layout);
 

@@ -17,7 +17,7 @@ extern "C" void trw_resources_register_resource();
 namespace host::gtk {
 
 using platform::Color;
-namespace StandardColors = platform::ui::StandardColors;
+namespace StandardColors = kit::StandardColors;
 
 namespace {
 
@@ -182,20 +182,20 @@ bool Theme::animationsEnabled() const
     return enabled;
 }
 
-Theme::FontDescription Theme::describe(const platform::ui::Font& font) const
+Theme::FontDescription Theme::describe(const kit::Font& font) const
 {
     char* name = nullptr;
     g_object_get(gtk_settings_get_default(), "gtk-font-name", &name, nullptr);
     FontDescription description(
         pango_font_description_from_string(name ? name : "Sans 11"), &pango_font_description_free);
     g_free(name);
-    const bool follows = font.sizing == platform::ui::TextSizing::FollowsSetting;
+    const bool follows = font.sizing == kit::TextSizing::FollowsSetting;
     const double dpi = follows ? settingsDpi() : defaultDpi;
     double size = pango_font_description_get_size(description.get());
     if (!pango_font_description_get_size_is_absolute(description.get()))
         size *= dpi / 72;
     pango_font_description_set_absolute_size(description.get(), size * relativeSize(font.pointSize));
-    if (font.weight == platform::ui::FontWeight::Bold)
+    if (font.weight == kit::FontWeight::Bold)
         pango_font_description_set_weight(description.get(), PANGO_WEIGHT_BOLD);
     return description;
 }

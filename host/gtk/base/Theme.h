@@ -38,7 +38,7 @@ public:
     /// The theme's typeface in the size that stands for the font's. The body text has the desktop's own size;
     /// smaller roles shrink half as much as they would on a phone's display, which keeps them legible.
     using FontDescription = std::unique_ptr<PangoFontDescription, decltype(&pango_font_description_free)>;
-    FontDescription describe(const platform::ui::Font& font) const;
+    FontDescription describe(const kit::Font& font) const;
     ObjectRef<PangoContext> makePangoContext() const;
 
     /// The widget whose style answers for the colours: the window.

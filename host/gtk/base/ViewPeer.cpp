@@ -12,9 +12,9 @@ namespace host::gtk {
 
 using platform::Point;
 using platform::Size;
-using platform::ui::View;
-using platform::ui::ViewChange;
-using platform::ui::ViewChanges;
+using kit::View;
+using kit::ViewChange;
+using kit::ViewChanges;
 
 namespace {
 
@@ -23,7 +23,7 @@ constexpr ViewChanges everything = ViewChange::Frame | ViewChange::Bounds | View
     | ViewChange::Selection | ViewChange::Display | ViewChange::Layout | ViewChange::IntrinsicSize
     | ViewChange::Accessibility | ViewChange::Gestures;
 
-GskRoundedRect shapeOf(const platform::ui::ViewStyle& style, double width, double height)
+GskRoundedRect shapeOf(const kit::ViewStyle& style, double width, double height)
 {
     graphene_rect_t bounds;
     graphene_rect_init(&bounds, 0, 0, static_cast<float>(width), static_cast<float>(height));

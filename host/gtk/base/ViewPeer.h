@@ -20,11 +20,11 @@ class GestureFeed;
 /// widget of the view's kind if it has one, and places the subviews' peers at the frames of the model.
 /// Changes are mirrored once a frame. It knows its view weakly, and the view knows it weakly. Main thread
 /// only.
-class ViewPeer : public platform::ui::ViewObserver,
+class ViewPeer : public kit::ViewObserver,
                  public CanvasClient,
                  public std::enable_shared_from_this<ViewPeer> {
 public:
-    ViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::View>& view,
+    ViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::View>& view,
         GtkAccessibleRole role = GTK_ACCESSIBLE_ROLE_GROUP);
     ~ViewPeer() override;
     ViewPeer(const ViewPeer&) = delete;
@@ -35,7 +35,7 @@ public:
 
     GtkWidget* widget() const { return _canvas.get(); }
     GtkWidget* native() const { return _native.get(); } ///< null: this kind has none
-    std::shared_ptr<platform::ui::View> view() const { return _view.lock(); }
+    std::shared_ptr<kit::View> view() const { return _view.lock(); }
     const std::vector<std::shared_ptr<ViewPeer>>& children() const { return _children; }
 
     /// Makes this the root of a place in the toolkit's own layout: `onResize` is told the size that the place
@@ -49,8 +49,8 @@ public:
     /// Moves the keyboard focus here. False: the view does not take it.
     virtual bool grabFocus();
 
-    void viewDidChange(platform::ui::View& view, platform::ui::ViewChanges changes) override;
-    void viewWantsFocus(platform::ui::View& view, bool focus) override;
+    void viewDidChange(kit::View& view, kit::ViewChanges changes) override;
+    void viewWantsFocus(kit::View& view, bool focus) override;
 
     platform::Size canvasNaturalSize(double forWidth) override;
     void canvasAllocate(int width, int height) override;
@@ -67,28 +67,28 @@ protected:
     virtual GtkWidget* childContainer() const { return _canvas.get(); }
     virtual platform::Point childOrigin() const;
     /// Brings changes of the model to the widgets.
-    virtual void mirror(platform::ui::View& view, platform::ui::ViewChanges changes);
+    virtual void mirror(kit::View& view, kit::ViewChanges changes);
     void allocateChildren();
     void connect(SignalConnection connection) { _connections.push_back(std::move(connection)); }
 
 private:
     void mirrorPending();
-    void mirrorSubviews(const platform::ui::View& view);
-    void mirrorAccessibility(const platform::ui::View& view);
-    void mirrorGestures(const platform::ui::View& view);
+    void mirrorSubviews(const kit::View& view);
+    void mirrorAccessibility(const kit::View& view);
+    void mirrorGestures(const kit::View& view);
     void dropFocus();
     void queueAllocateInParent() const;
     void snapshotBackground(
-        const platform::ui::View& view, GtkSnapshot* snapshot, const GskRoundedRect& shape);
-    void snapshotBorder(const platform::ui::View& view, GtkSnapshot* snapshot, const GskRoundedRect& shape);
-    void snapshotDrawing(const platform::ui::View& view, GtkSnapshot* snapshot);
+        const kit::View& view, GtkSnapshot* snapshot, const GskRoundedRect& shape);
+    void snapshotBorder(const kit::View& view, GtkSnapshot* snapshot, const GskRoundedRect& shape);
+    void snapshotDrawing(const kit::View& view, GtkSnapshot* snapshot);
 
     std::shared_ptr<PeerContext> _context;
-    std::weak_ptr<platform::ui::View> _view;
-    const platform::ui::View* _key;
+    std::weak_ptr<kit::View> _view;
+    const kit::View* _key;
     ObjectRef<GtkWidget> _canvas, _native;
     std::vector<std::shared_ptr<ViewPeer>> _children;
-    platform::ui::ViewChanges _pending;
+    kit::ViewChanges _pending;
     ResizeHandler _onResize;
     FittingSize _fit;
     platform::Size _allocated{-1, -1};
@@ -98,6 +98,6 @@ private:
 
 /// Makes the peer of a view by the view's kind, started.
 std::shared_ptr<ViewPeer> makePeer(
-    const std::shared_ptr<PeerContext>& context, const std::shared_ptr<platform::ui::View>& view);
+    const std::shared_ptr<PeerContext>& context, const std::shared_ptr<kit::View>& view);
 
 } // namespace host::gtk

@@ -13,7 +13,7 @@
 
 namespace host::gtk {
 
-using platform::components::NoteView;
+using screens::NoteView;
 
 namespace {
 
@@ -66,7 +66,7 @@ GtkWidget* makeText(const std::shared_ptr<NoteView>& note)
 void addNoteMaker(PeerContext& context)
 {
     context.setHostedViewMaker(
-        NoteView::kindName, [](platform::ui::HostedView& hosted, GtkWidget* current) -> ObjectRef<GtkWidget> {
+        NoteView::kindName, [](kit::HostedView& hosted, GtkWidget* current) -> ObjectRef<GtkWidget> {
             if (current)
                 return ObjectRef<GtkWidget>::retain(current);
             // The kind says what the view is.

@@ -15,7 +15,7 @@ using platform::Image;
 using platform::Point;
 using platform::Rect;
 using platform::Size;
-using platform::components::PreviewPagesView;
+using screens::PreviewPagesView;
 
 namespace {
 

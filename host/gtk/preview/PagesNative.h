@@ -14,7 +14,7 @@ namespace host::gtk {
 /// Shows a document's pages one below the other, with what is found and what is selected in them.
 class PagesNative : public PreviewNative, private ZoomContent {
 public:
-    explicit PagesNative(const std::shared_ptr<platform::components::PreviewPagesView>& view);
+    explicit PagesNative(const std::shared_ptr<screens::PreviewPagesView>& view);
 
     GtkWidget* widget() const override { return _scroller.widget(); }
     void start() override;
@@ -28,7 +28,7 @@ public:
     void previewShouldCopy() override;
 
 private:
-    using View = platform::components::PreviewPagesView;
+    using View = screens::PreviewPagesView;
     struct Shown {
         platform::Image picture;
         ObjectRef<GdkPaintable> texture;

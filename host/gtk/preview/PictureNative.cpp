@@ -12,7 +12,7 @@ namespace host::gtk {
 using platform::Image;
 using platform::Rect;
 using platform::Size;
-using platform::components::PreviewPictureView;
+using screens::PreviewPictureView;
 
 namespace {
 

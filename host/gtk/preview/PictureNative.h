@@ -14,7 +14,7 @@ namespace host::gtk {
 /// Shows a picture in tiles, so that a large one costs what is seen of it; an animation frame by frame.
 class PictureNative : public PreviewNative, private ZoomContent {
 public:
-    explicit PictureNative(const std::shared_ptr<platform::components::PreviewPictureView>& view);
+    explicit PictureNative(const std::shared_ptr<screens::PreviewPictureView>& view);
     ~PictureNative() override;
 
     GtkWidget* widget() const override { return _scroller.widget(); }
@@ -42,7 +42,7 @@ private:
     void scheduleFrame();
     const platform::Image& frame() const { return _picture.frames[_frame].image; }
 
-    std::weak_ptr<platform::components::PreviewPictureView> _view;
+    std::weak_ptr<screens::PreviewPictureView> _view;
     platform::Picture _picture;
     std::vector<Tile> _tiles;
     platform::Size _base;

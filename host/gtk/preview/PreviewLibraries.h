@@ -9,10 +9,10 @@
 #include <memory>
 #include <string>
 
-namespace platform::components {
+namespace screens {
 class PreviewMediaView;
 class PreviewTextView;
-} // namespace platform::components
+} // namespace screens
 
 namespace host::gtk {
 
@@ -33,9 +33,9 @@ public:
         const std::string& path) const = 0;
     /// The native sides of views, not started yet. Main thread.
     virtual std::shared_ptr<PreviewNative> makeTextNative(
-        const std::shared_ptr<platform::components::PreviewTextView>& view) const = 0;
+        const std::shared_ptr<screens::PreviewTextView>& view) const = 0;
     virtual std::shared_ptr<PreviewNative> makeMediaNative(
-        const std::shared_ptr<platform::components::PreviewMediaView>& view) const = 0;
+        const std::shared_ptr<screens::PreviewMediaView>& view) const = 0;
 };
 
 /// The one function that the module is asked for, and its name.

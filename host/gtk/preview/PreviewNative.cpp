@@ -14,10 +14,7 @@
 #include <functional>
 
 namespace host::gtk {
-
-namespace components = platform::components;
-namespace ui = platform::ui;
-using components::PreviewView;
+using screens::PreviewView;
 
 namespace {
 
@@ -40,7 +37,7 @@ template <typename View, typename Fill>
 void addMaker(PeerContext& context, Fill fill)
 {
     context.setHostedViewMaker(
-        View::kindName, [fill](ui::HostedView& hosted, GtkWidget* current) -> ObjectRef<GtkWidget> {
+        View::kindName, [fill](kit::HostedView& hosted, GtkWidget* current) -> ObjectRef<GtkWidget> {
             if (current)
                 return ObjectRef<GtkWidget>::retain(current);
             auto holder = ObjectRef<GtkWidget>::retain(adw_bin_new());
@@ -111,16 +108,16 @@ void PreviewNative::addShortcuts(GtkWidget* widget, const std::weak_ptr<PreviewV
     add("<Control>minus|<Control>KP_Subtract",
         [](PreviewView& shown) { shown.setZoom(shown.zoom() / PreviewView::zoomStep); });
     add("<Control>0|<Control>KP_0", [](PreviewView& shown) { shown.setZoom(PreviewView::minZoom); });
-    add("<Control>g|F3", [](PreviewView& shown) { shown.showMatch(components::MatchStep::Next); });
+    add("<Control>g|F3", [](PreviewView& shown) { shown.showMatch(screens::MatchStep::Next); });
     add("<Control><Shift>g|<Shift>F3",
-        [](PreviewView& shown) { shown.showMatch(components::MatchStep::Previous); });
+        [](PreviewView& shown) { shown.showMatch(screens::MatchStep::Previous); });
     gtk_widget_add_controller(widget, controller);
 }
 
 void addPreviewMakers(PeerContext& context, const std::shared_ptr<PreviewModule>& previews)
 {
-    addOwnMaker<components::PreviewPictureView, PictureNative>(context);
-    addOwnMaker<components::PreviewPagesView, PagesNative>(context);
+    addOwnMaker<screens::PreviewPictureView, PictureNative>(context);
+    addOwnMaker<screens::PreviewPagesView, PagesNative>(context);
     addModuleMaker(context, previews, &PreviewLibraries::makeTextNative);
     addModuleMaker(context, previews, &PreviewLibraries::makeMediaNative);
 }

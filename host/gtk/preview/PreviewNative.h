@@ -16,7 +16,7 @@ namespace host::gtk {
 class PreviewModule;
 
 /// The native side of a previewed document's view. It lives as long as its widget. Main thread only.
-class PreviewNative : public platform::components::PreviewViewObserver,
+class PreviewNative : public screens::PreviewViewObserver,
                       public std::enable_shared_from_this<PreviewNative> {
 public:
     virtual GtkWidget* widget() const = 0;
@@ -25,7 +25,7 @@ public:
 
 protected:
     /// Ctrl+F and the keys for the zoom, wherever the focus is in the window while the widget is seen.
-    static void addShortcuts(GtkWidget* widget, const std::weak_ptr<platform::components::PreviewView>& view);
+    static void addShortcuts(GtkWidget* widget, const std::weak_ptr<screens::PreviewView>& view);
 };
 
 /// Makes a context know the views of previewed documents.

@@ -143,7 +143,7 @@ Result<Pages> readText(const std::string& path, const PreviewModule& previews)
     if (!g_file_get_contents(path.c_str(), &bytes, &length, &error))
         return printingError(textKey("The document could not be read."), error);
     const std::unique_ptr<char, decltype(&g_free)> owned(bytes, g_free);
-    using platform::components::decodedText;
+    using screens::decodedText;
     return Pages(
         std::make_shared<TextPages>(decodedText({bytes, length}, platform::TextEnd::Whole, previews)));
 }

@@ -14,7 +14,7 @@ namespace host::gtk {
 using platform::Point;
 using platform::Rect;
 using platform::Size;
-using platform::components::PreviewView;
+using screens::PreviewView;
 
 namespace {
 

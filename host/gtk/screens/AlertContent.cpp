@@ -13,8 +13,6 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 namespace {
 
 constexpr double fieldHeight = 44; ///< points
@@ -39,21 +37,21 @@ GtkWidget* makeLabel(const char* styleClass)
 }
 
 /// Two short buttons stand beside each other, others in a column.
-GtkOrientation buttonOrientation(const ui::AlertController& alert)
+GtkOrientation buttonOrientation(const kit::AlertController& alert)
 {
     const auto& actions = alert.actions();
     const bool isShort = std::ranges::all_of(
         actions, [](const auto& action) { return action->title().size() <= longestTitleBesideAnother; });
-    const bool isRow = alert.alertStyle() == ui::AlertStyle::Alert && actions.size() == 2 && isShort;
+    const bool isRow = alert.alertStyle() == kit::AlertStyle::Alert && actions.size() == 2 && isShort;
     return isRow ? GTK_ORIENTATION_HORIZONTAL : GTK_ORIENTATION_VERTICAL;
 }
 
 /// The preferred action; without one, and in every sheet, the one that cancels.
-bool standsOut(const ui::AlertAction& action, const ui::AlertController& alert)
+bool standsOut(const kit::AlertAction& action, const kit::AlertController& alert)
 {
     const auto preferred = alert.preferredAction();
-    const bool mayCancel = !preferred || alert.alertStyle() == ui::AlertStyle::ActionSheet;
-    return preferred.get() == &action || (mayCancel && action.style() == ui::AlertActionStyle::Cancel);
+    const bool mayCancel = !preferred || alert.alertStyle() == kit::AlertStyle::ActionSheet;
+    return preferred.get() == &action || (mayCancel && action.style() == kit::AlertActionStyle::Cancel);
 }
 
 void setText(GtkWidget* label, const std::string& text)
@@ -78,14 +76,14 @@ bool focusWithin(GtkWidget* widget)
 } // namespace
 
 /// Gathers what the alert tells, once a frame.
-class AlertContent::Observer : public ui::AlertObserver {
+class AlertContent::Observer : public kit::AlertObserver {
 public:
     explicit Observer(AlertContent& content)
         : _content(content)
     {
     }
     ~Observer() override { _content._context->scheduler().cancel(this); }
-    void alertDidChange(ui::AlertController&) override
+    void alertDidChange(kit::AlertController&) override
     {
         _content._context->scheduler().schedule(this, [this] { _content.mirror(); });
     }
@@ -94,7 +92,7 @@ private:
     AlertContent& _content;
 };
 
-AlertContent::AlertContent(std::shared_ptr<PeerContext> context, std::shared_ptr<ui::AlertController> alert)
+AlertContent::AlertContent(std::shared_ptr<PeerContext> context, std::shared_ptr<kit::AlertController> alert)
     : _context(std::move(context))
     , _alert(alert)
     , _card(ObjectRef<GtkWidget>::retain(GTK_WIDGET(g_object_new(GTK_TYPE_BOX, "accessible-role",
@@ -153,7 +151,7 @@ void AlertContent::addContentView(const Alert& alert)
     const auto content = alert.contentViewController();
     if (!content)
         return;
-    const std::weak_ptr<ui::View> weak = content->view();
+    const std::weak_ptr<kit::View> weak = content->view();
     auto peer = makePeer(_context, content->view());
     const auto resize = [weak](platform::Size size) {
         if (const auto view = weak.lock())
@@ -171,16 +169,16 @@ void AlertContent::addContentView(const Alert& alert)
     _peers.push_back(std::move(peer));
 }
 
-GtkWidget* AlertContent::makeActionButton(const std::shared_ptr<ui::AlertAction>& action, const Alert& alert)
+GtkWidget* AlertContent::makeActionButton(const std::shared_ptr<kit::AlertAction>& action, const Alert& alert)
 {
     auto* button = gtk_button_new_with_label(action->title().c_str());
     gtk_widget_add_css_class(button, "alert-action");
     gtk_widget_set_hexpand(button, TRUE);
-    if (action->style() == ui::AlertActionStyle::Destructive)
+    if (action->style() == kit::AlertActionStyle::Destructive)
         gtk_widget_add_css_class(button, "destructive");
     if (standsOut(*action, alert))
         gtk_widget_add_css_class(button, "preferred");
-    const std::weak_ptr<ui::AlertAction> weak = action;
+    const std::weak_ptr<kit::AlertAction> weak = action;
     _connections.push_back(connectSignal<void()>(button, "clicked", [alertOfButton = _alert, weak] {
         const auto pressed = weak.lock();
         if (const auto asked = alertOfButton.lock(); asked && pressed)
@@ -245,7 +243,7 @@ void AlertContent::focus()
     }
     // What is written in an alert is what it is there for.
     const auto content = alert->contentViewController();
-    const bool isHosted = content && std::dynamic_pointer_cast<ui::HostedView>(content->view());
+    const bool isHosted = content && std::dynamic_pointer_cast<kit::HostedView>(content->view());
     if (isHosted && !_peers.empty() && focusWithin(_peers.front()->widget()))
         return;
     const auto preferred = alert->preferredAction() ? alert->preferredAction() : alert->escapeAction();

@@ -19,7 +19,7 @@ class ViewPeer;
 /// The card of an alert or an action sheet: texts, fields, content and buttons.
 class AlertContent : public LayerContent {
 public:
-    AlertContent(std::shared_ptr<PeerContext> context, std::shared_ptr<platform::ui::AlertController> alert);
+    AlertContent(std::shared_ptr<PeerContext> context, std::shared_ptr<kit::AlertController> alert);
     ~AlertContent() override;
 
     GtkWidget* widget() const override { return _card.get(); }
@@ -27,12 +27,12 @@ public:
 
 private:
     class Observer;
-    using Alert = platform::ui::AlertController;
+    using Alert = kit::AlertController;
     void buildBody();
     void addFields(const Alert& alert);
     void addContentView(const Alert& alert);
     void rebuildButtons(const Alert& alert);
-    GtkWidget* makeActionButton(const std::shared_ptr<platform::ui::AlertAction>& action, const Alert& alert);
+    GtkWidget* makeActionButton(const std::shared_ptr<kit::AlertAction>& action, const Alert& alert);
     void mirror();
     void returnPressed();
 

@@ -12,8 +12,6 @@
 #include <utility>
 
 namespace host::gtk {
-
-namespace ui = platform::ui;
 using platform::Size;
 
 namespace {
@@ -21,16 +19,16 @@ namespace {
 constexpr int iconSize = 16;
 constexpr double barHeight = 44; ///< of what stands in a bar, points
 
-const char* iconOf(ui::SystemItem item)
+const char* iconOf(kit::SystemItem item)
 {
     switch (item) {
-    case ui::SystemItem::Action:
+    case kit::SystemItem::Action:
         return "emblem-shared-symbolic";
-    case ui::SystemItem::Trash:
+    case kit::SystemItem::Trash:
         return "user-trash-symbolic";
-    case ui::SystemItem::Organize:
+    case kit::SystemItem::Organize:
         return "folder-symbolic";
-    case ui::SystemItem::Search:
+    case kit::SystemItem::Search:
         return "system-search-symbolic";
     default:
         return nullptr;
@@ -38,13 +36,13 @@ const char* iconOf(ui::SystemItem item)
 }
 
 /// A standard item has the platform's name for it, in English until here.
-std::string nameOf(const ui::BarButtonItem& item)
+std::string nameOf(const kit::BarButtonItem& item)
 {
     const auto& name = item.accessibilityLabel();
-    return item.systemItem() == ui::SystemItem::Plain ? name : platform::localized(name);
+    return item.systemItem() == kit::SystemItem::Plain ? name : platform::localized(name);
 }
 
-std::optional<platform::Image> imageOf(const ui::BarButtonItem& item, bool isNarrow)
+std::optional<platform::Image> imageOf(const kit::BarButtonItem& item, bool isNarrow)
 {
     if (isNarrow && item.compactImage())
         return item.compactImage();
@@ -57,10 +55,10 @@ std::optional<platform::Image> imageOf(const ui::BarButtonItem& item, bool isNar
 } // namespace
 
 std::shared_ptr<ViewPeer> makeEmbeddedPeer(
-    const std::shared_ptr<PeerContext>& context, const std::shared_ptr<ui::View>& view, double minimumHeight)
+    const std::shared_ptr<PeerContext>& context, const std::shared_ptr<kit::View>& view, double minimumHeight)
 {
     auto peer = makePeer(context, view);
-    const std::weak_ptr<ui::View> weak = view;
+    const std::weak_ptr<kit::View> weak = view;
     const auto resize = [weak](Size size) {
         if (const auto shown = weak.lock())
             shown->setFrame({0, 0, size.width, size.height});
@@ -77,14 +75,14 @@ std::shared_ptr<ViewPeer> makeEmbeddedPeer(
 }
 
 std::shared_ptr<BarItemPeer> BarItemPeer::make(
-    const std::shared_ptr<PeerContext>& context, const std::shared_ptr<ui::BarButtonItem>& item)
+    const std::shared_ptr<PeerContext>& context, const std::shared_ptr<kit::BarButtonItem>& item)
 {
     auto peer = std::make_shared<BarItemPeer>(context, item);
     item->setObserver(peer);
     return peer;
 }
 
-BarItemPeer::BarItemPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::BarButtonItem>& item)
+BarItemPeer::BarItemPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::BarButtonItem>& item)
     : _context(std::move(context))
     , _item(item)
     , _key(item.get())
@@ -103,7 +101,7 @@ BarItemPeer::~BarItemPeer()
     _context->removeWidget(*_key, widget());
 }
 
-void BarItemPeer::showCustomView(const std::shared_ptr<ui::View>& view)
+void BarItemPeer::showCustomView(const std::shared_ptr<kit::View>& view)
 {
     _customPeer = makeEmbeddedPeer(_context, view, barHeight);
     _widget = ObjectRef<GtkWidget>::retain(_customPeer->widget());
@@ -123,7 +121,7 @@ void BarItemPeer::showButton()
     });
 }
 
-void BarItemPeer::barButtonItemDidChange(ui::BarButtonItem&)
+void BarItemPeer::barButtonItemDidChange(kit::BarButtonItem&)
 {
     _context->scheduler().schedule(this, [this] {
         if (const auto changed = item())
@@ -139,7 +137,7 @@ void BarItemPeer::setNarrow(bool narrow)
     mirror(*shown);
 }
 
-void BarItemPeer::showFace(const ui::BarButtonItem& shown)
+void BarItemPeer::showFace(const kit::BarButtonItem& shown)
 {
     auto* button = GTK_BUTTON(widget());
     const auto image = imageOf(shown, _isNarrow);
@@ -156,12 +154,12 @@ void BarItemPeer::showFace(const ui::BarButtonItem& shown)
     gtk_widget_set_tooltip_text(widget(), image ? nameOf(shown).c_str() : nullptr);
 }
 
-void BarItemPeer::mirror(const ui::BarButtonItem& shown)
+void BarItemPeer::mirror(const kit::BarButtonItem& shown)
 {
     if (_customPeer)
         return;
     showFace(shown);
-    if (shown.systemItem() == ui::SystemItem::Done)
+    if (shown.systemItem() == kit::SystemItem::Done)
         gtk_widget_add_css_class(widget(), "suggested-action");
     gtk_widget_set_sensitive(widget(), shown.isEnabled());
     gtk_accessible_update_property(

@@ -14,32 +14,32 @@ namespace host::gtk {
 class ViewPeer;
 
 /// Shows one entry of a bar that is no space: a button, or the entry's own view. Main thread only.
-class BarItemPeer : public platform::ui::BarButtonItemObserver,
+class BarItemPeer : public kit::BarButtonItemObserver,
                     public std::enable_shared_from_this<BarItemPeer> {
 public:
     static std::shared_ptr<BarItemPeer> make(const std::shared_ptr<PeerContext>& context,
-        const std::shared_ptr<platform::ui::BarButtonItem>& item);
+        const std::shared_ptr<kit::BarButtonItem>& item);
     BarItemPeer(
-        std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::BarButtonItem>& item);
+        std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::BarButtonItem>& item);
     ~BarItemPeer() override;
 
     GtkWidget* widget() const { return _widget.get(); }
-    std::shared_ptr<platform::ui::BarButtonItem> item() const { return _item.lock(); }
+    std::shared_ptr<kit::BarButtonItem> item() const { return _item.lock(); }
 
     /// In a narrow bar an entry that has a compact image shows it in place of its title.
     void setNarrow(bool narrow);
 
-    void barButtonItemDidChange(platform::ui::BarButtonItem& item) override;
+    void barButtonItemDidChange(kit::BarButtonItem& item) override;
 
 private:
-    void showCustomView(const std::shared_ptr<platform::ui::View>& view);
+    void showCustomView(const std::shared_ptr<kit::View>& view);
     void showButton();
-    void mirror(const platform::ui::BarButtonItem& item);
-    void showFace(const platform::ui::BarButtonItem& item);
+    void mirror(const kit::BarButtonItem& item);
+    void showFace(const kit::BarButtonItem& item);
 
     std::shared_ptr<PeerContext> _context;
-    std::weak_ptr<platform::ui::BarButtonItem> _item;
-    const platform::ui::BarButtonItem* _key;
+    std::weak_ptr<kit::BarButtonItem> _item;
+    const kit::BarButtonItem* _key;
     ObjectRef<GtkWidget> _widget;
     std::shared_ptr<ViewPeer> _customPeer;
     SignalConnection _onClicked;
@@ -49,6 +49,6 @@ private:
 /// A view of the kit at a place of its own in the toolkit's layout: the place asks for the size that the view
 /// wants, at least `minimumHeight`, and the view gets the size of the place.
 std::shared_ptr<ViewPeer> makeEmbeddedPeer(const std::shared_ptr<PeerContext>& context,
-    const std::shared_ptr<platform::ui::View>& view, double minimumHeight);
+    const std::shared_ptr<kit::View>& view, double minimumHeight);
 
 } // namespace host::gtk

@@ -32,7 +32,7 @@ GtkWindowHost::GtkWindowHost(
 {
 }
 
-void GtkWindowHost::showWindow(const std::shared_ptr<platform::ui::Window>& window)
+void GtkWindowHost::showWindow(const std::shared_ptr<kit::Window>& window)
 {
     if (_peer && _peer->model() == window) {
         _peer->show();

@@ -12,13 +12,13 @@
 namespace host::gtk {
 
 /// Shows the application's window. Main thread only.
-class GtkWindowHost : public platform::ui::WindowHost {
+class GtkWindowHost : public kit::WindowHost {
 public:
     /// `application` may be null: windows then stand for themselves.
     GtkWindowHost(
         AdwApplication* application, const WindowSize& size, std::shared_ptr<PreviewModule> previews);
 
-    void showWindow(const std::shared_ptr<platform::ui::Window>& window) override;
+    void showWindow(const std::shared_ptr<kit::Window>& window) override;
     /// The window that is shown; null: none.
     const std::shared_ptr<WindowPeer>& windowPeer() const { return _peer; }
     /// Called for each window before it is on the screen.

@@ -31,7 +31,7 @@ std::string keyOf(const ActivityOffer& offer)
 /// A toast's own title has one line, in which a phone would show neither the name nor the device in full.
 GtkWidget* makeTitle(const ActivityOffer& offer)
 {
-    using platform::components::displayName;
+    using screens::displayName;
     const auto text = platform::localized(
         "“%1$@” on %2$@", {displayName(offer.document.lastPathComponent()), displayName(offer.deviceName)});
     auto* title = gtk_label_new(text.c_str());

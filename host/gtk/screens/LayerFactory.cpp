@@ -17,8 +17,6 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 namespace {
 
 constexpr int popoverWidth = 320, popoverHeight = 420; ///< of a screen in a popover, points
@@ -28,7 +26,7 @@ constexpr int widestPopover = 360; ///< its arrow and shadow included
 class ScreenContent : public LayerContent {
 public:
     ScreenContent(
-        const std::shared_ptr<PeerContext>& context, const std::shared_ptr<ui::ViewController>& screen)
+        const std::shared_ptr<PeerContext>& context, const std::shared_ptr<kit::ViewController>& screen)
         : _box(ObjectRef<GtkWidget>::retain(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0)))
         , _peer(makeScreenPeer(context, screen, WindowButtons::Hidden))
     {
@@ -57,9 +55,9 @@ std::optional<GdkRectangle> boundsIn(GtkWidget* canvas, GtkWidget* widget, std::
 
 /// The rectangle of a view, which may be one that only marks a place in another that is shown.
 std::optional<GdkRectangle> boundsIn(
-    GtkWidget* canvas, const PeerContext& context, const ui::View& view, const platform::Rect& rect)
+    GtkWidget* canvas, const PeerContext& context, const kit::View& view, const platform::Rect& rect)
 {
-    auto shown = const_cast<ui::View&>(view).shared_from_this();
+    auto shown = const_cast<kit::View&>(view).shared_from_this();
     const auto isShown = [&] {
         const auto* peer = context.peerOf(*shown);
         return peer && gtk_widget_get_mapped(peer->widget());
@@ -74,13 +72,13 @@ std::optional<GdkRectangle> boundsIn(
 
 /// Where a popover points at, in the window; nothing when there is no such place now.
 std::optional<GdkRectangle> anchorOf(
-    const PeerContext& context, GtkWidget* canvas, const ui::PopoverAnchor& anchor)
+    const PeerContext& context, GtkWidget* canvas, const kit::PopoverAnchor& anchor)
 {
-    if (const auto* item = std::get_if<std::weak_ptr<ui::BarButtonItem>>(&anchor)) {
+    if (const auto* item = std::get_if<std::weak_ptr<kit::BarButtonItem>>(&anchor)) {
         const auto shown = item->lock();
         return shown ? boundsIn(canvas, context.widgetOf(*shown), {}) : std::nullopt;
     }
-    if (const auto* place = std::get_if<ui::ViewAnchor>(&anchor)) {
+    if (const auto* place = std::get_if<kit::ViewAnchor>(&anchor)) {
         const auto view = place->view.lock();
         return view ? boundsIn(canvas, context, *view, place->rect) : std::nullopt;
     }
@@ -88,10 +86,10 @@ std::optional<GdkRectangle> anchorOf(
 }
 
 /// Beside the anchor where only such arrows are allowed and there is room, else towards the window's middle.
-GtkPositionType sideOf(const ui::PopoverAnchor& anchor, const GdkRectangle& place, platform::Size window)
+GtkPositionType sideOf(const kit::PopoverAnchor& anchor, const GdkRectangle& place, platform::Size window)
 {
-    const auto* view = std::get_if<ui::ViewAnchor>(&anchor);
-    if (view && view->arrows == ui::ArrowDirections::LeftOrRight) {
+    const auto* view = std::get_if<kit::ViewAnchor>(&anchor);
+    if (view && view->arrows == kit::ArrowDirections::LeftOrRight) {
         if (window.width - place.x - place.width >= widestPopover)
             return GTK_POS_RIGHT;
         if (place.x >= widestPopover)
@@ -100,7 +98,7 @@ GtkPositionType sideOf(const ui::PopoverAnchor& anchor, const GdkRectangle& plac
     return place.y + place.height / 2 > window.height / 2 ? GTK_POS_TOP : GTK_POS_BOTTOM;
 }
 
-class LayerMaker : public ui::ViewControllerVisitor {
+class LayerMaker : public kit::ViewControllerVisitor {
 public:
     LayerMaker(const std::shared_ptr<PeerContext>& context, const LayerSite& site)
         : _context(context)
@@ -108,22 +106,22 @@ public:
     {
     }
 
-    void visit(ui::ViewController& screen) override { makeScreen(screen); }
-    void visit(ui::NavigationController& screen) override { makeScreen(screen); }
-    void visit(ui::AlertController& screen) override
+    void visit(kit::ViewController& screen) override { makeScreen(screen); }
+    void visit(kit::NavigationController& screen) override { makeScreen(screen); }
+    void visit(kit::AlertController& screen) override
     {
-        const auto alert = std::static_pointer_cast<ui::AlertController>(screen.shared_from_this());
+        const auto alert = std::static_pointer_cast<kit::AlertController>(screen.shared_from_this());
         const auto content = [&] { return std::make_unique<AlertContent>(_context, alert); };
-        if (screen.alertStyle() == ui::AlertStyle::Alert)
+        if (screen.alertStyle() == kit::AlertStyle::Alert)
             makeOverlay(screen, content(), LayerPlace::Center);
         else if (const auto anchor = popoverAnchor(screen))
             makePopover(screen, content(), *anchor);
         else
             makeOverlay(screen, content(), isWide() ? LayerPlace::Center : LayerPlace::Bottom);
     }
-    void visit(ui::SearchPresentation& screen) override
+    void visit(kit::SearchPresentation& screen) override
     {
-        const auto search = std::static_pointer_cast<ui::SearchPresentation>(screen.shared_from_this());
+        const auto search = std::static_pointer_cast<kit::SearchPresentation>(screen.shared_from_this());
         makeOverlay(screen, std::make_unique<SearchContent>(_context, search), LayerPlace::Cover);
     }
 
@@ -131,36 +129,36 @@ public:
 
 private:
     bool isWide() const { return _site.size.width >= wideWindow; }
-    std::optional<GdkRectangle> popoverAnchor(const ui::ViewController& screen) const
+    std::optional<GdkRectangle> popoverAnchor(const kit::ViewController& screen) const
     {
         return isWide() ? anchorOf(*_context, _site.canvas, screen.popoverAnchor()) : std::nullopt;
     }
-    static std::function<void()> cancel(ui::ViewController& screen)
+    static std::function<void()> cancel(kit::ViewController& screen)
     {
         return [weak = screen.weak_from_this()] {
             if (const auto left = weak.lock())
                 left->userCancelled();
         };
     }
-    void makeScreen(ui::ViewController& screen)
+    void makeScreen(kit::ViewController& screen)
     {
         auto content = std::make_unique<ScreenContent>(_context, screen.shared_from_this());
         const auto style = screen.presentationStyle();
-        const auto anchor = style == ui::PresentationStyle::Popover ? popoverAnchor(screen) : std::nullopt;
+        const auto anchor = style == kit::PresentationStyle::Popover ? popoverAnchor(screen) : std::nullopt;
         if (anchor) {
             gtk_widget_set_size_request(content->widget(), popoverWidth, popoverHeight);
             makePopover(screen, std::move(content), *anchor);
             return;
         }
-        const bool fills = style == ui::PresentationStyle::FullScreen || !isWide();
+        const bool fills = style == kit::PresentationStyle::FullScreen || !isWide();
         makeOverlay(screen, std::move(content), fills ? LayerPlace::Cover : LayerPlace::Sheet);
     }
-    void makeOverlay(ui::ViewController& screen, std::unique_ptr<LayerContent> content, LayerPlace place)
+    void makeOverlay(kit::ViewController& screen, std::unique_ptr<LayerContent> content, LayerPlace place)
     {
         layer = std::make_unique<OverlayLayer>(_site.overlay, std::move(content), place, cancel(screen));
     }
     void makePopover(
-        ui::ViewController& screen, std::unique_ptr<LayerContent> content, const GdkRectangle& anchor)
+        kit::ViewController& screen, std::unique_ptr<LayerContent> content, const GdkRectangle& anchor)
     {
         const auto side = sideOf(screen.popoverAnchor(), anchor, _site.size);
         layer =
@@ -174,7 +172,7 @@ private:
 } // namespace
 
 std::unique_ptr<PresentedLayer> makeLayer(const std::shared_ptr<PeerContext>& context, const LayerSite& site,
-    const std::shared_ptr<ui::ViewController>& screen)
+    const std::shared_ptr<kit::ViewController>& screen)
 {
     LayerMaker maker(context, site);
     screen->accept(maker);

@@ -9,7 +9,7 @@
 
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 class ViewController;
 }
 
@@ -24,7 +24,7 @@ struct LayerSite {
 
 /// The layer of a presented screen, by the kind of screen, its style and the window's width.
 std::unique_ptr<PresentedLayer> makeLayer(const std::shared_ptr<PeerContext>& context, const LayerSite& site,
-    const std::shared_ptr<platform::ui::ViewController>& screen);
+    const std::shared_ptr<kit::ViewController>& screen);
 
 /// A window of at least this width has popovers and sheets, a narrower one is filled.
 inline constexpr double wideWindow = 600; ///< points

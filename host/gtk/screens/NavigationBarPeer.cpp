@@ -12,8 +12,6 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 namespace {
 
 GtkWidget* makeIconButton(const char* icon, const std::string& name)
@@ -120,7 +118,7 @@ NavigationBarPeer::~NavigationBarPeer()
     clearItems();
 }
 
-void NavigationBarPeer::show(const ui::NavigationItem& item, bool hasBackTarget)
+void NavigationBarPeer::show(const kit::NavigationItem& item, bool hasBackTarget)
 {
     adw_window_title_set_title(ADW_WINDOW_TITLE(_title), item.title().c_str());
     adw_window_title_set_subtitle(ADW_WINDOW_TITLE(_title), item.subtitle().c_str());
@@ -132,14 +130,14 @@ void NavigationBarPeer::show(const ui::NavigationItem& item, bool hasBackTarget)
         showItems(item);
 }
 
-void NavigationBarPeer::showSearch(const ui::NavigationItem& item)
+void NavigationBarPeer::showSearch(const kit::NavigationItem& item)
 {
     _onSearch = item.searchAction();
     _onNew = item.newAction();
     gtk_widget_set_visible(_search, static_cast<bool>(_onSearch));
 }
 
-void NavigationBarPeer::showMenuButton(const ui::NavigationItem& item)
+void NavigationBarPeer::showMenuButton(const kit::NavigationItem& item)
 {
     _makeMenu = item.menu();
     gtk_widget_set_visible(_menu, static_cast<bool>(_makeMenu));
@@ -156,12 +154,12 @@ void NavigationBarPeer::clearItems()
     }
 }
 
-void NavigationBarPeer::showItems(const ui::NavigationItem& item)
+void NavigationBarPeer::showItems(const kit::NavigationItem& item)
 {
     clearItems();
     _left = item.leftItems();
     _right = item.rightItems();
-    const auto add = [this](const std::shared_ptr<ui::BarButtonItem>& entry, auto pack) {
+    const auto add = [this](const std::shared_ptr<kit::BarButtonItem>& entry, auto pack) {
         if (entry->isSpace())
             return;
         _peers.push_back(BarItemPeer::make(_context, entry));

@@ -10,7 +10,7 @@
 #include <functional>
 #include <vector>
 
-namespace platform::ui {
+namespace kit {
 class NavigationItem;
 }
 
@@ -27,7 +27,7 @@ public:
     void setOnBack(std::function<void()> callback) { _onBack = std::move(callback); }
 
     /// `hasBackTarget` says whether there is a screen to go back to.
-    void show(const platform::ui::NavigationItem& item, bool hasBackTarget);
+    void show(const kit::NavigationItem& item, bool hasBackTarget);
     /// A narrow bar keeps of the window's own buttons only the one that closes it, and of its entries the
     /// compact images.
     void setNarrow(bool narrow);
@@ -35,19 +35,19 @@ public:
     void setWindowButtons(bool shown);
 
 private:
-    void showItems(const platform::ui::NavigationItem& item);
-    void showSearch(const platform::ui::NavigationItem& item);
-    void showMenuButton(const platform::ui::NavigationItem& item);
+    void showItems(const kit::NavigationItem& item);
+    void showSearch(const kit::NavigationItem& item);
+    void showMenuButton(const kit::NavigationItem& item);
     void clearItems();
 
     std::shared_ptr<PeerContext> _context;
     ObjectRef<GtkWidget> _bar;
     GtkWidget *_title, *_back, *_search, *_menu;
-    platform::ui::BarButtonItems _left, _right;
+    kit::BarButtonItems _left, _right;
     std::vector<std::shared_ptr<BarItemPeer>> _peers;
     GtkEventController* _newKey = nullptr;
     std::function<void()> _onBack, _onSearch, _onNew;
-    std::function<platform::ui::Menu()> _makeMenu;
+    std::function<kit::Menu()> _makeMenu;
     SignalConnections _connections;
     bool _isNarrow = false;
 };

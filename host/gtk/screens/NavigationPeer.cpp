@@ -10,10 +10,8 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 std::shared_ptr<NavigationPeer> NavigationPeer::make(const std::shared_ptr<PeerContext>& context,
-    const std::shared_ptr<ui::NavigationController>& navigation, WindowButtons buttons)
+    const std::shared_ptr<kit::NavigationController>& navigation, WindowButtons buttons)
 {
     auto peer = std::make_shared<NavigationPeer>(context, navigation, buttons);
     navigation->view()->setObserver(peer);
@@ -24,7 +22,7 @@ std::shared_ptr<NavigationPeer> NavigationPeer::make(const std::shared_ptr<PeerC
 }
 
 NavigationPeer::NavigationPeer(std::shared_ptr<PeerContext> context,
-    const std::shared_ptr<ui::NavigationController>& navigation, WindowButtons buttons)
+    const std::shared_ptr<kit::NavigationController>& navigation, WindowButtons buttons)
     : _context(std::move(context))
     , _navigation(navigation)
     , _buttons(buttons)
@@ -103,7 +101,7 @@ std::shared_ptr<ScreenPage> NavigationPeer::pageOf(const Screen& screen)
 }
 
 void NavigationPeer::navigationWillTransition(
-    ui::NavigationController&, const ui::NavigationTransition& transition, ui::TransitionToken token)
+    kit::NavigationController&, const kit::NavigationTransition& transition, kit::TransitionToken token)
 {
     _token.finish();
     _token = std::move(token);
@@ -113,20 +111,20 @@ void NavigationPeer::navigationWillTransition(
         return;
     }
     const bool moves = transition.animated && transition.from && _context->theme().animationsEnabled()
-        && gtk_widget_get_mapped(_leaflet.get()) && transition.kind != ui::NavigationKind::Replace;
+        && gtk_widget_get_mapped(_leaflet.get()) && transition.kind != kit::NavigationKind::Replace;
     if (moves)
         showMoving(transition);
     else
         showWithoutMovement(transition.to);
 }
 
-void NavigationPeer::showMoving(const ui::NavigationTransition& transition)
+void NavigationPeer::showMoving(const kit::NavigationTransition& transition)
 {
     _mirroring = true;
     const auto page = pageOf(transition.to);
     page->load();
     const auto from = knownPageOf(transition.from);
-    if (from && transition.kind == ui::NavigationKind::Pop) {
+    if (from && transition.kind == kit::NavigationKind::Pop) {
         // The page below may have been made only now, behind the one that goes.
         adw_leaflet_reorder_child_after(leaflet(), from->widget(), page->widget());
     } else if (from) {
@@ -261,19 +259,19 @@ void NavigationPeer::updateAll()
         page->updateBars();
 }
 
-void NavigationPeer::stackDidChange(ui::NavigationController&)
+void NavigationPeer::stackDidChange(kit::NavigationController&)
 {
     settle();
 }
 
-void NavigationPeer::toolbarVisibilityDidChange(ui::NavigationController&, bool /*animated*/)
+void NavigationPeer::toolbarVisibilityDidChange(kit::NavigationController&, bool /*animated*/)
 {
     updateAll();
 }
 
-void NavigationPeer::viewDidChange(ui::View&, ui::ViewChanges changes)
+void NavigationPeer::viewDidChange(kit::View&, kit::ViewChanges changes)
 {
-    if (!changes.contains(ui::ViewChange::Layout))
+    if (!changes.contains(kit::ViewChange::Layout))
         return;
     _context->scheduler().schedule(this, [this] {
         if (const auto stack = _navigation.lock())

@@ -17,14 +17,14 @@ namespace host::gtk {
 /// Shows a stack of screens as the pages of an AdwLeaflet. A page is built for the top screen and for the one
 /// below it, which a swipe can uncover.
 class NavigationPeer : public ScreenPeer,
-                       public platform::ui::NavigationObserver,
-                       public platform::ui::ViewObserver,
+                       public kit::NavigationObserver,
+                       public kit::ViewObserver,
                        public std::enable_shared_from_this<NavigationPeer> {
 public:
     static std::shared_ptr<NavigationPeer> make(const std::shared_ptr<PeerContext>& context,
-        const std::shared_ptr<platform::ui::NavigationController>& navigation, WindowButtons buttons);
+        const std::shared_ptr<kit::NavigationController>& navigation, WindowButtons buttons);
     NavigationPeer(std::shared_ptr<PeerContext> context,
-        const std::shared_ptr<platform::ui::NavigationController>& navigation, WindowButtons buttons);
+        const std::shared_ptr<kit::NavigationController>& navigation, WindowButtons buttons);
     ~NavigationPeer() override;
 
     GtkWidget* widget() const override { return _bin.widget(); }
@@ -34,18 +34,18 @@ public:
     /// The page of the screen on top; null: the stack is empty.
     std::shared_ptr<ScreenPage> topPage() const;
 
-    void navigationWillTransition(platform::ui::NavigationController& controller,
-        const platform::ui::NavigationTransition& transition, platform::ui::TransitionToken token) override;
-    void stackDidChange(platform::ui::NavigationController& controller) override;
-    void toolbarVisibilityDidChange(platform::ui::NavigationController& controller, bool animated) override;
-    void viewDidChange(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+    void navigationWillTransition(kit::NavigationController& controller,
+        const kit::NavigationTransition& transition, kit::TransitionToken token) override;
+    void stackDidChange(kit::NavigationController& controller) override;
+    void toolbarVisibilityDidChange(kit::NavigationController& controller, bool animated) override;
+    void viewDidChange(kit::View& view, kit::ViewChanges changes) override;
 
 private:
-    using Screen = std::shared_ptr<platform::ui::ViewController>;
+    using Screen = std::shared_ptr<kit::ViewController>;
     std::shared_ptr<ScreenPage> pageOf(const Screen& screen);
     std::shared_ptr<ScreenPage> knownPageOf(const Screen& screen) const;
     void showWithoutMovement(const Screen& screen);
-    void showMoving(const platform::ui::NavigationTransition& transition);
+    void showMoving(const kit::NavigationTransition& transition);
     void forgetFingersThatLeft();
     void transitionRunningChanged();
     void swipedAway(const ScreenPage& top);
@@ -56,12 +56,12 @@ private:
     void hideAllButTop() const;
 
     std::shared_ptr<PeerContext> _context;
-    std::weak_ptr<platform::ui::NavigationController> _navigation;
+    std::weak_ptr<kit::NavigationController> _navigation;
     WindowButtons _buttons;
     SizedBin _bin;
     ObjectRef<GtkWidget> _leaflet;
     std::vector<std::shared_ptr<ScreenPage>> _pages; ///< in the order of the leaflet
-    platform::ui::TransitionToken _token;
+    kit::TransitionToken _token;
     bool _mirroring = false; ///< the program moves the pages, not the user
     SignalConnections _connections;
 };

@@ -10,11 +10,9 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 std::shared_ptr<ScreenPage> ScreenPage::make(const std::shared_ptr<PeerContext>& context,
-    const std::shared_ptr<ui::NavigationController>& navigation,
-    const std::shared_ptr<ui::ViewController>& screen, WindowButtons buttons)
+    const std::shared_ptr<kit::NavigationController>& navigation,
+    const std::shared_ptr<kit::ViewController>& screen, WindowButtons buttons)
 {
     auto page = std::make_shared<ScreenPage>(context, navigation, screen, buttons);
     screen->setObserver(page);
@@ -23,8 +21,8 @@ std::shared_ptr<ScreenPage> ScreenPage::make(const std::shared_ptr<PeerContext>&
 }
 
 ScreenPage::ScreenPage(std::shared_ptr<PeerContext> context,
-    const std::shared_ptr<ui::NavigationController>& navigation,
-    const std::shared_ptr<ui::ViewController>& screen, WindowButtons buttons)
+    const std::shared_ptr<kit::NavigationController>& navigation,
+    const std::shared_ptr<kit::ViewController>& screen, WindowButtons buttons)
     : _context(std::move(context))
     , _navigation(navigation)
     , _screen(screen)
@@ -71,7 +69,7 @@ void ScreenPage::load()
     gtk_box_insert_child_after(GTK_BOX(widget()), _content->widget(), _navigationBar.widget());
 }
 
-void ScreenPage::barsDidChange(ui::ViewController&)
+void ScreenPage::barsDidChange(kit::ViewController&)
 {
     updateBars();
 }
@@ -90,7 +88,7 @@ void ScreenPage::mirrorBars()
     const auto& screens = stack->viewControllers();
     const bool hasBackTarget = !screens.empty() && screens.front() != shown;
     _navigationBar.show(shown->navigationItem(), hasBackTarget);
-    _navigationBar.setNarrow(shown->traits().horizontalSizeClass == ui::SizeClass::Compact);
+    _navigationBar.setNarrow(shown->traits().horizontalSizeClass == kit::SizeClass::Compact);
     _toolbar.show(shown->toolbarItems());
     _toolbar.setHidden(stack->isToolbarHidden() || shown->toolbarItems().empty());
 }

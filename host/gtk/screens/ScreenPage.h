@@ -10,27 +10,27 @@
 
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 class NavigationController;
 class ViewController;
-} // namespace platform::ui
+} // namespace kit
 
 namespace host::gtk {
 
 /// One screen of a navigation between its bars.
-class ScreenPage : public platform::ui::ViewControllerObserver,
+class ScreenPage : public kit::ViewControllerObserver,
                    public std::enable_shared_from_this<ScreenPage> {
 public:
     static std::shared_ptr<ScreenPage> make(const std::shared_ptr<PeerContext>& context,
-        const std::shared_ptr<platform::ui::NavigationController>& navigation,
-        const std::shared_ptr<platform::ui::ViewController>& screen, WindowButtons buttons);
+        const std::shared_ptr<kit::NavigationController>& navigation,
+        const std::shared_ptr<kit::ViewController>& screen, WindowButtons buttons);
     ScreenPage(std::shared_ptr<PeerContext> context,
-        const std::shared_ptr<platform::ui::NavigationController>& navigation,
-        const std::shared_ptr<platform::ui::ViewController>& screen, WindowButtons buttons);
+        const std::shared_ptr<kit::NavigationController>& navigation,
+        const std::shared_ptr<kit::ViewController>& screen, WindowButtons buttons);
     ~ScreenPage() override;
 
     GtkWidget* widget() const { return _box.get(); }
-    std::shared_ptr<platform::ui::ViewController> screen() const { return _screen.lock(); }
+    std::shared_ptr<kit::ViewController> screen() const { return _screen.lock(); }
     NavigationBarPeer& navigationBar() { return _navigationBar; }
     ViewPeer* content() const { return _content.get(); } ///< null until the screen is shown first
 
@@ -40,14 +40,14 @@ public:
     void updateBars();
     void focus();
 
-    void barsDidChange(platform::ui::ViewController& controller) override;
+    void barsDidChange(kit::ViewController& controller) override;
 
 private:
     void mirrorBars();
 
     std::shared_ptr<PeerContext> _context;
-    std::weak_ptr<platform::ui::NavigationController> _navigation;
-    std::weak_ptr<platform::ui::ViewController> _screen;
+    std::weak_ptr<kit::NavigationController> _navigation;
+    std::weak_ptr<kit::ViewController> _screen;
     ObjectRef<GtkWidget> _box;
     NavigationBarPeer _navigationBar;
     ToolbarPeer _toolbar;

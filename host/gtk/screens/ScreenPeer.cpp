@@ -12,17 +12,15 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 namespace {
 
 /// The view of a screen at the size of its place.
 class PlainScreenPeer : public ScreenPeer {
 public:
-    PlainScreenPeer(const std::shared_ptr<PeerContext>& context, ui::ViewController& screen)
+    PlainScreenPeer(const std::shared_ptr<PeerContext>& context, kit::ViewController& screen)
         : _peer(makePeer(context, screen.view()))
     {
-        const std::weak_ptr<ui::View> weak = screen.view();
+        const std::weak_ptr<kit::View> weak = screen.view();
         _peer->setRoot([weak](platform::Size size) {
             if (const auto view = weak.lock())
                 view->setFrame({0, 0, size.width, size.height});
@@ -38,7 +36,7 @@ private:
     std::shared_ptr<ViewPeer> _peer;
 };
 
-class ScreenPeerFactory : public ui::ViewControllerVisitor {
+class ScreenPeerFactory : public kit::ViewControllerVisitor {
 public:
     ScreenPeerFactory(const std::shared_ptr<PeerContext>& context, WindowButtons buttons)
         : _context(context)
@@ -46,19 +44,19 @@ public:
     {
     }
 
-    void visit(ui::ViewController& screen) override { makePlain(screen); }
-    void visit(ui::AlertController& screen) override { makePlain(screen); }
-    void visit(ui::SearchPresentation& screen) override { makePlain(screen); }
-    void visit(ui::NavigationController& screen) override
+    void visit(kit::ViewController& screen) override { makePlain(screen); }
+    void visit(kit::AlertController& screen) override { makePlain(screen); }
+    void visit(kit::SearchPresentation& screen) override { makePlain(screen); }
+    void visit(kit::NavigationController& screen) override
     {
         peer = NavigationPeer::make(_context,
-            std::static_pointer_cast<ui::NavigationController>(screen.shared_from_this()), _buttons);
+            std::static_pointer_cast<kit::NavigationController>(screen.shared_from_this()), _buttons);
     }
 
     std::shared_ptr<ScreenPeer> peer;
 
 private:
-    void makePlain(ui::ViewController& screen) { peer = std::make_shared<PlainScreenPeer>(_context, screen); }
+    void makePlain(kit::ViewController& screen) { peer = std::make_shared<PlainScreenPeer>(_context, screen); }
 
     const std::shared_ptr<PeerContext>& _context;
     WindowButtons _buttons;
@@ -67,7 +65,7 @@ private:
 } // namespace
 
 std::shared_ptr<ScreenPeer> makeScreenPeer(const std::shared_ptr<PeerContext>& context,
-    const std::shared_ptr<ui::ViewController>& screen, WindowButtons buttons)
+    const std::shared_ptr<kit::ViewController>& screen, WindowButtons buttons)
 {
     ScreenPeerFactory factory(context, buttons);
     screen->accept(factory);

@@ -7,7 +7,7 @@
 
 #include <memory>
 
-namespace platform::ui {
+namespace kit {
 class ViewController;
 }
 
@@ -29,6 +29,6 @@ public:
 
 /// By the kind of screen: a navigation with its bars, or the view of the screen alone.
 std::shared_ptr<ScreenPeer> makeScreenPeer(const std::shared_ptr<PeerContext>& context,
-    const std::shared_ptr<platform::ui::ViewController>& screen, WindowButtons buttons);
+    const std::shared_ptr<kit::ViewController>& screen, WindowButtons buttons);
 
 } // namespace host::gtk

@@ -7,21 +7,19 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
-class SearchContent::Observer : public ui::SearchObserver {
+class SearchContent::Observer : public kit::SearchObserver {
 public:
     explicit Observer(SearchContent& content)
         : _content(content)
     {
     }
-    void searchQueryWasSet(ui::SearchPresentation& search) override
+    void searchQueryWasSet(kit::SearchPresentation& search) override
     {
         const SignalBlock block(_content._onEdited);
         gtk_editable_set_text(GTK_EDITABLE(_content._entry), search.query().c_str());
         gtk_editable_set_position(GTK_EDITABLE(_content._entry), -1);
     }
-    void searchWantsFocus(ui::SearchPresentation&, bool focus) override
+    void searchWantsFocus(kit::SearchPresentation&, bool focus) override
     {
         if (focus)
             gtk_widget_grab_focus(_content._entry);
@@ -32,7 +30,7 @@ private:
 };
 
 SearchContent::SearchContent(
-    const std::shared_ptr<PeerContext>& context, const std::shared_ptr<ui::SearchPresentation>& search)
+    const std::shared_ptr<PeerContext>& context, const std::shared_ptr<kit::SearchPresentation>& search)
     : _search(search)
     , _box(ObjectRef<GtkWidget>::retain(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0)))
     , _entry(gtk_search_entry_new())
@@ -53,7 +51,7 @@ SearchContent::~SearchContent()
     gtk_box_remove(GTK_BOX(widget()), _results->widget());
 }
 
-void SearchContent::buildBar(const ui::SearchPresentation& search)
+void SearchContent::buildBar(const kit::SearchPresentation& search)
 {
     auto* bar = gtk_box_new(GTK_ORIENTATION_HORIZONTAL, 0);
     gtk_widget_add_css_class(bar, "kit-search-bar");

@@ -16,7 +16,7 @@ namespace host::gtk {
 class SearchContent : public LayerContent {
 public:
     SearchContent(const std::shared_ptr<PeerContext>& context,
-        const std::shared_ptr<platform::ui::SearchPresentation>& search);
+        const std::shared_ptr<kit::SearchPresentation>& search);
     ~SearchContent() override;
 
     GtkWidget* widget() const override { return _box.get(); }
@@ -25,9 +25,9 @@ public:
 private:
     class Observer;
     void connectKeys();
-    void buildBar(const platform::ui::SearchPresentation& search);
+    void buildBar(const kit::SearchPresentation& search);
 
-    std::weak_ptr<platform::ui::SearchPresentation> _search;
+    std::weak_ptr<kit::SearchPresentation> _search;
     ObjectRef<GtkWidget> _box;
     GtkWidget *_entry, *_cancel;
     std::shared_ptr<ScreenPeer> _results;

@@ -9,14 +9,12 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 namespace {
 
 constexpr int itemDistance = 6;
 
 /// Whether a view without a width of its own is among the entries: it then gets what flexible spaces would.
-bool hasTakingView(const ui::BarButtonItems& items)
+bool hasTakingView(const kit::BarButtonItems& items)
 {
     return std::ranges::any_of(items, [](const auto& item) {
         return item->customView() && item->customView()->intrinsicContentSize().width <= 0;
@@ -50,7 +48,7 @@ void ToolbarPeer::clear()
         _context->scheduler().release(std::move(peer));
 }
 
-void ToolbarPeer::show(const ui::BarButtonItems& items)
+void ToolbarPeer::show(const kit::BarButtonItems& items)
 {
     if (items == _items)
         return;
@@ -61,7 +59,7 @@ void ToolbarPeer::show(const ui::BarButtonItems& items)
         append(item, viewTakesAll);
 }
 
-void ToolbarPeer::append(const std::shared_ptr<ui::BarButtonItem>& item, bool viewTakesAll)
+void ToolbarPeer::append(const std::shared_ptr<kit::BarButtonItem>& item, bool viewTakesAll)
 {
     if (!item->isSpace()) {
         _peers.push_back(BarItemPeer::make(_context, item));
@@ -71,7 +69,7 @@ void ToolbarPeer::append(const std::shared_ptr<ui::BarButtonItem>& item, bool vi
         return;
     }
     auto* space = gtk_box_new(GTK_ORIENTATION_HORIZONTAL, 0);
-    if (item->systemItem() == ui::SystemItem::FixedSpace)
+    if (item->systemItem() == kit::SystemItem::FixedSpace)
         gtk_widget_set_size_request(space, static_cast<int>(item->width()), -1);
     else
         gtk_widget_set_hexpand(space, !viewTakesAll);

@@ -17,17 +17,17 @@ public:
 
     GtkWidget* widget() const { return _bar.get(); }
     /// Shows these entries from now on; nothing happens when they are shown already.
-    void show(const platform::ui::BarButtonItems& items);
+    void show(const kit::BarButtonItems& items);
     void setHidden(bool hidden);
 
 private:
     void clear();
-    void append(const std::shared_ptr<platform::ui::BarButtonItem>& item, bool viewTakesAll);
+    void append(const std::shared_ptr<kit::BarButtonItem>& item, bool viewTakesAll);
 
     std::shared_ptr<PeerContext> _context;
     ObjectRef<GtkWidget> _bar;
     GtkWidget* _box;
-    platform::ui::BarButtonItems _items;
+    kit::BarButtonItems _items;
     std::vector<std::shared_ptr<BarItemPeer>> _peers;
 };
 

@@ -12,8 +12,6 @@
 #include <algorithm>
 
 namespace host::gtk {
-
-namespace ui = platform::ui;
 using platform::Size;
 
 namespace {
@@ -23,7 +21,7 @@ constexpr double lowWindow = 480; ///< points; lower is compact
 } // namespace
 
 std::shared_ptr<WindowPeer> WindowPeer::make(AdwApplication* application,
-    const std::shared_ptr<ui::Window>& window, const WindowSize& size,
+    const std::shared_ptr<kit::Window>& window, const WindowSize& size,
     const std::shared_ptr<PreviewModule>& previews)
 {
     auto peer = std::make_shared<WindowPeer>(application, window, size, previews);
@@ -32,7 +30,7 @@ std::shared_ptr<WindowPeer> WindowPeer::make(AdwApplication* application,
     return peer;
 }
 
-WindowPeer::WindowPeer(AdwApplication* application, const std::shared_ptr<ui::Window>& window,
+WindowPeer::WindowPeer(AdwApplication* application, const std::shared_ptr<kit::Window>& window,
     const WindowSize& size, const std::shared_ptr<PreviewModule>& previews)
     : _model(window)
     , _theme(std::make_shared<Theme>())
@@ -46,7 +44,7 @@ WindowPeer::WindowPeer(AdwApplication* application, const std::shared_ptr<ui::Wi
     addPreviewMakers(*_context, previews);
     addNoteMaker(*_context);
     _context->scheduler().attach(_window.get());
-    ui::TextMeasurer::install(_measurer);
+    kit::TextMeasurer::install(_measurer);
     connectWindow();
     connectInput();
 }
@@ -54,7 +52,7 @@ WindowPeer::WindowPeer(AdwApplication* application, const std::shared_ptr<ui::Wi
 WindowPeer::~WindowPeer()
 {
     _connections.clear();
-    ui::TextMeasurer::install(nullptr);
+    kit::TextMeasurer::install(nullptr);
     _layers.clear();
     _leaving.clear();
     _root.reset();
@@ -150,36 +148,36 @@ void WindowPeer::showRoot()
     adw_toast_overlay_set_child(_toasts, _root->widget());
 }
 
-void WindowPeer::rootDidChange(ui::Window&)
+void WindowPeer::rootDidChange(kit::Window&)
 {
     showRoot();
 }
 
-ui::TraitCollection WindowPeer::traits(Size size) const
+kit::TraitCollection WindowPeer::traits(Size size) const
 {
-    ui::TraitCollection traits;
-    traits.horizontalSizeClass = size.width < wideWindow ? ui::SizeClass::Compact : ui::SizeClass::Regular;
-    traits.verticalSizeClass = size.height < lowWindow ? ui::SizeClass::Compact : ui::SizeClass::Regular;
+    kit::TraitCollection traits;
+    traits.horizontalSizeClass = size.width < wideWindow ? kit::SizeClass::Compact : kit::SizeClass::Regular;
+    traits.verticalSizeClass = size.height < lowWindow ? kit::SizeClass::Compact : kit::SizeClass::Regular;
     traits.layoutDirection = gtk_widget_get_direction(_window.get()) == GTK_TEXT_DIR_RTL
-        ? ui::LayoutDirection::RightToLeft
-        : ui::LayoutDirection::LeftToRight;
-    traits.colorScheme = _theme->isDark() ? ui::ColorScheme::Dark : ui::ColorScheme::Light;
+        ? kit::LayoutDirection::RightToLeft
+        : kit::LayoutDirection::LeftToRight;
+    traits.colorScheme = _theme->isDark() ? kit::ColorScheme::Dark : kit::ColorScheme::Light;
     return traits;
 }
 
 void WindowPeer::updateScreen(Size size) const
 {
-    ui::Screen screen;
+    kit::Screen screen;
     screen.bounds = {0, 0, size.width, size.height};
     screen.scale = gtk_widget_get_scale_factor(_window.get());
-    screen.idiom = size.width < wideWindow ? ui::UserInterfaceIdiom::Phone : ui::UserInterfaceIdiom::Tablet;
-    ui::Screen::setMain(screen);
+    screen.idiom = size.width < wideWindow ? kit::UserInterfaceIdiom::Phone : kit::UserInterfaceIdiom::Tablet;
+    kit::Screen::setMain(screen);
 }
 
 void WindowPeer::resized(Size size)
 {
     updateScreen(size);
-    ui::TraitCollection::setApplication(traits(size));
+    kit::TraitCollection::setApplication(traits(size));
     if (const auto shown = model())
         shown->resized(size, traits(size));
 }
@@ -202,7 +200,7 @@ WindowSize WindowPeer::currentSize() const
 }
 
 void WindowPeer::windowWillPresent(
-    ui::Window&, const ui::Presentation& presentation, ui::TransitionToken token)
+    kit::Window&, const kit::Presentation& presentation, kit::TransitionToken token)
 {
     const LayerSite site{GTK_OVERLAY(_overlay), _bin->widget(), _bin->size()};
     const bool moves =
@@ -228,7 +226,7 @@ void WindowPeer::giveFocusBack(GtkWidget* before) const
 }
 
 void WindowPeer::windowWillDismiss(
-    ui::Window&, const ui::Presentation& presentation, ui::TransitionToken token)
+    kit::Window&, const kit::Presentation& presentation, kit::TransitionToken token)
 {
     const auto found = std::ranges::find(
         _layers, presentation.presented.get(), [](const Layer& layer) { return layer.screen; });

@@ -27,13 +27,13 @@ struct WindowSize {
 };
 
 /// Shows the application's window: the root screen, and layers over it for what is presented.
-class WindowPeer : public platform::ui::WindowObserver, public std::enable_shared_from_this<WindowPeer> {
+class WindowPeer : public kit::WindowObserver, public std::enable_shared_from_this<WindowPeer> {
 public:
     /// `application` may be null: the window then stands for itself.
     static std::shared_ptr<WindowPeer> make(AdwApplication* application,
-        const std::shared_ptr<platform::ui::Window>& window, const WindowSize& size,
+        const std::shared_ptr<kit::Window>& window, const WindowSize& size,
         const std::shared_ptr<PreviewModule>& previews);
-    WindowPeer(AdwApplication* application, const std::shared_ptr<platform::ui::Window>& window,
+    WindowPeer(AdwApplication* application, const std::shared_ptr<kit::Window>& window,
         const WindowSize& size, const std::shared_ptr<PreviewModule>& previews);
     ~WindowPeer() override;
 
@@ -43,7 +43,7 @@ public:
     AdwToastOverlay* toasts() const { return _toasts; }
     const std::shared_ptr<PeerContext>& context() const { return _context; }
     ScreenPeer* rootPeer() const { return _root.get(); }
-    std::shared_ptr<platform::ui::Window> model() const { return _model.lock(); }
+    std::shared_ptr<kit::Window> model() const { return _model.lock(); }
     WindowSize currentSize() const;
     /// Called when the window becomes the one that the user works with, or no longer is it.
     void setOnActive(std::function<void(bool)> callback) { _onActive = std::move(callback); }
@@ -52,15 +52,15 @@ public:
 
     static constexpr int minimumWidth = 360, minimumHeight = 294; ///< a phone with its keyboard up
 
-    void rootDidChange(platform::ui::Window& window) override;
-    void windowWillPresent(platform::ui::Window& window, const platform::ui::Presentation& presentation,
-        platform::ui::TransitionToken token) override;
-    void windowWillDismiss(platform::ui::Window& window, const platform::ui::Presentation& presentation,
-        platform::ui::TransitionToken token) override;
+    void rootDidChange(kit::Window& window) override;
+    void windowWillPresent(kit::Window& window, const kit::Presentation& presentation,
+        kit::TransitionToken token) override;
+    void windowWillDismiss(kit::Window& window, const kit::Presentation& presentation,
+        kit::TransitionToken token) override;
 
 private:
     struct Layer {
-        const platform::ui::ViewController* screen;
+        const kit::ViewController* screen;
         std::shared_ptr<PresentedLayer> layer;
         ObjectRef<GtkWidget> focusBefore;
     };
@@ -69,7 +69,7 @@ private:
     void connectWindow();
     void showRoot();
     void resized(platform::Size size);
-    platform::ui::TraitCollection traits(platform::Size size) const;
+    kit::TraitCollection traits(platform::Size size) const;
     void updateScreen(platform::Size size) const;
     void themeChanged();
     void coverAllButTop();
@@ -78,7 +78,7 @@ private:
     bool goBack();
     void closed();
 
-    std::weak_ptr<platform::ui::Window> _model;
+    std::weak_ptr<kit::Window> _model;
     std::shared_ptr<Theme> _theme;
     std::shared_ptr<PangoTextMeasurer> _measurer;
     std::shared_ptr<PeerContext> _context;

@@ -7,21 +7,19 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 ActivityIndicatorPeer::ActivityIndicatorPeer(
-    std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::ActivityIndicator>& indicator)
+    std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ActivityIndicator>& indicator)
     : ViewPeer(std::move(context), indicator)
     , _indicator(indicator)
 {
     setNative(gtk_spinner_new());
 }
 
-void ActivityIndicatorPeer::mirror(ui::View& shown, ui::ViewChanges changes)
+void ActivityIndicatorPeer::mirror(kit::View& shown, kit::ViewChanges changes)
 {
     ViewPeer::mirror(shown, changes);
     const auto indicator = _indicator.lock();
-    if (!indicator || !changes.contains(ui::ViewChange::Content))
+    if (!indicator || !changes.contains(kit::ViewChange::Content))
         return;
     gtk_widget_set_visible(native(), indicator->isAnimating());
     gtk_spinner_set_spinning(GTK_SPINNER(native()), indicator->isAnimating());

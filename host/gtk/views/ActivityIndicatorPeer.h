@@ -5,7 +5,7 @@
 
 #include "host/gtk/base/ViewPeer.h"
 
-namespace platform::ui {
+namespace kit {
 class ActivityIndicator;
 }
 
@@ -15,13 +15,13 @@ namespace host::gtk {
 class ActivityIndicatorPeer : public ViewPeer {
 public:
     ActivityIndicatorPeer(std::shared_ptr<PeerContext> context,
-        const std::shared_ptr<platform::ui::ActivityIndicator>& indicator);
+        const std::shared_ptr<kit::ActivityIndicator>& indicator);
 
 protected:
-    void mirror(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+    void mirror(kit::View& view, kit::ViewChanges changes) override;
 
 private:
-    std::weak_ptr<platform::ui::ActivityIndicator> _indicator;
+    std::weak_ptr<kit::ActivityIndicator> _indicator;
 };
 
 } // namespace host::gtk

@@ -44,20 +44,18 @@ void trw_button_init(TrwButton*) { }
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 namespace {
 
 constexpr int iconSize = 16;
 
-const char* styleClass(ui::ButtonStyle style)
+const char* styleClass(kit::ButtonStyle style)
 {
     switch (style) {
-    case ui::ButtonStyle::System:
+    case kit::ButtonStyle::System:
         return "system";
-    case ui::ButtonStyle::Suggested:
+    case kit::ButtonStyle::Suggested:
         return "suggested-action";
-    case ui::ButtonStyle::Destructive:
+    case kit::ButtonStyle::Destructive:
         return "destructive";
     }
     return "system";
@@ -70,7 +68,7 @@ GtkWidget* makeTouchButton()
     return GTK_WIDGET(g_object_new(trw_button_get_type(), nullptr));
 }
 
-ButtonPeer::ButtonPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::Button>& button)
+ButtonPeer::ButtonPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::Button>& button)
     : ViewPeer(std::move(context), button)
     , _button(button)
     , _icon(gtk_image_new())
@@ -90,15 +88,15 @@ ButtonPeer::ButtonPeer(std::shared_ptr<PeerContext> context, const std::shared_p
     }));
 }
 
-void ButtonPeer::mirror(ui::View& shown, ui::ViewChanges changes)
+void ButtonPeer::mirror(kit::View& shown, kit::ViewChanges changes)
 {
     ViewPeer::mirror(shown, changes);
     const auto button = _button.lock();
-    if (button && changes.contains(ui::ViewChange::Content))
+    if (button && changes.contains(kit::ViewChange::Content))
         mirrorContent(*button);
 }
 
-void ButtonPeer::mirrorContent(const ui::Button& button)
+void ButtonPeer::mirrorContent(const kit::Button& button)
 {
     showLabel(GTK_LABEL(_title), *button.titleLabel(), context().theme());
     gtk_widget_set_visible(_title, !button.title().empty());

@@ -5,7 +5,7 @@
 
 #include "host/gtk/base/ViewPeer.h"
 
-namespace platform::ui {
+namespace kit {
 class Button;
 }
 
@@ -15,15 +15,15 @@ namespace host::gtk {
 /// centre.
 class ButtonPeer : public ViewPeer {
 public:
-    ButtonPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::Button>& button);
+    ButtonPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::Button>& button);
 
 protected:
-    void mirror(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+    void mirror(kit::View& view, kit::ViewChanges changes) override;
 
 private:
-    void mirrorContent(const platform::ui::Button& button);
+    void mirrorContent(const kit::Button& button);
 
-    std::weak_ptr<platform::ui::Button> _button;
+    std::weak_ptr<kit::Button> _button;
     GtkWidget *_icon, *_title;
 };
 

@@ -7,24 +7,22 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 HostedViewPeer::HostedViewPeer(
-    std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::HostedView>& hosted)
+    std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::HostedView>& hosted)
     : ViewPeer(std::move(context), hosted)
     , _hosted(hosted)
 {
 }
 
-void HostedViewPeer::mirror(ui::View& shown, ui::ViewChanges changes)
+void HostedViewPeer::mirror(kit::View& shown, kit::ViewChanges changes)
 {
     const auto hosted = _hosted.lock();
-    if (hosted && changes.contains(ui::ViewChange::Content)) {
+    if (hosted && changes.contains(kit::ViewChange::Content)) {
         const auto* maker = context().hostedViewMaker(hosted->kind());
         const auto made = maker ? (*maker)(*hosted, native()) : ObjectRef<GtkWidget>();
         if (made.get() != native()) {
             setNative(made.get());
-            changes |= ui::ViewChange::Accessibility;
+            changes |= kit::ViewChange::Accessibility;
             gtk_widget_queue_allocate(widget());
         }
     }

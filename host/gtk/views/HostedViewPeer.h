@@ -5,7 +5,7 @@
 
 #include "host/gtk/base/ViewPeer.h"
 
-namespace platform::ui {
+namespace kit {
 class HostedView;
 }
 
@@ -15,13 +15,13 @@ namespace host::gtk {
 class HostedViewPeer : public ViewPeer {
 public:
     HostedViewPeer(
-        std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::HostedView>& hosted);
+        std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::HostedView>& hosted);
 
 protected:
-    void mirror(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+    void mirror(kit::View& view, kit::ViewChanges changes) override;
 
 private:
-    std::weak_ptr<platform::ui::HostedView> _hosted;
+    std::weak_ptr<kit::HostedView> _hosted;
 };
 
 } // namespace host::gtk

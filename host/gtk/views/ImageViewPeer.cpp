@@ -9,32 +9,30 @@
 #include <algorithm>
 
 namespace host::gtk {
-
-namespace ui = platform::ui;
 using platform::Rect;
 
 namespace {
 
-GtkContentFit fit(ui::ContentMode mode)
+GtkContentFit fit(kit::ContentMode mode)
 {
     switch (mode) {
-    case ui::ContentMode::ScaleToFill:
+    case kit::ContentMode::ScaleToFill:
         return GTK_CONTENT_FIT_FILL;
-    case ui::ContentMode::AspectFit:
+    case kit::ContentMode::AspectFit:
         return GTK_CONTENT_FIT_CONTAIN;
-    case ui::ContentMode::Center:
+    case kit::ContentMode::Center:
         return GTK_CONTENT_FIT_SCALE_DOWN;
     }
     return GTK_CONTENT_FIT_CONTAIN;
 }
 
-Rect placed(const ui::ImageView& view, double width, double height)
+Rect placed(const kit::ImageView& view, double width, double height)
 {
     const auto size = view.image()->size();
-    if (view.contentMode() == ui::ContentMode::ScaleToFill || size.width <= 0 || size.height <= 0)
+    if (view.contentMode() == kit::ContentMode::ScaleToFill || size.width <= 0 || size.height <= 0)
         return {0, 0, width, height};
     double factor = std::min(width / size.width, height / size.height);
-    if (view.contentMode() == ui::ContentMode::Center)
+    if (view.contentMode() == kit::ContentMode::Center)
         factor = std::min(factor, 1.0);
     const double shownWidth = size.width * factor, shownHeight = size.height * factor;
     return {(width - shownWidth) / 2, (height - shownHeight) / 2, shownWidth, shownHeight};
@@ -48,24 +46,24 @@ GtkWidget* silent(GType type)
 } // namespace
 
 ImageViewPeer::ImageViewPeer(
-    std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::ImageView>& imageView)
+    std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ImageView>& imageView)
     : ViewPeer(std::move(context), imageView,
         imageView->accessibility().label.empty() ? GTK_ACCESSIBLE_ROLE_GROUP : GTK_ACCESSIBLE_ROLE_IMG)
     , _imageView(imageView)
 {
 }
 
-void ImageViewPeer::mirror(ui::View& shown, ui::ViewChanges changes)
+void ImageViewPeer::mirror(kit::View& shown, kit::ViewChanges changes)
 {
     ViewPeer::mirror(shown, changes);
     const auto imageView = _imageView.lock();
     if (imageView
-        && (changes.contains(ui::ViewChange::Content)
-            || (_means == Means::Icon && changes.contains(ui::ViewChange::Frame))))
+        && (changes.contains(kit::ViewChange::Content)
+            || (_means == Means::Icon && changes.contains(kit::ViewChange::Frame))))
         mirrorImage(*imageView);
 }
 
-void ImageViewPeer::mirrorImage(const ui::ImageView& imageView)
+void ImageViewPeer::mirrorImage(const kit::ImageView& imageView)
 {
     const auto& image = imageView.image();
     if (!image) {
@@ -75,7 +73,7 @@ void ImageViewPeer::mirrorImage(const ui::ImageView& imageView)
         const auto& frame = imageView.frame();
         ImagePaint::show(
             GTK_IMAGE(native()), *image, std::max(1, static_cast<int>(std::min(frame.width, frame.height))));
-    } else if (imageView.magnification() == ui::ImageFilter::Nearest) {
+    } else if (imageView.magnification() == kit::ImageFilter::Nearest) {
         useMeans(Means::Drawing);
     } else {
         useMeans(Means::Picture);

@@ -5,7 +5,7 @@
 
 #include "host/gtk/base/ViewPeer.h"
 
-namespace platform::ui {
+namespace kit {
 class ImageView;
 }
 
@@ -16,19 +16,19 @@ namespace host::gtk {
 class ImageViewPeer : public ViewPeer {
 public:
     ImageViewPeer(
-        std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::ImageView>& imageView);
+        std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ImageView>& imageView);
 
     void canvasSnapshot(GtkSnapshot* snapshot) override;
 
 protected:
-    void mirror(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+    void mirror(kit::View& view, kit::ViewChanges changes) override;
 
 private:
     enum class Means { None, Picture, Icon, Drawing };
-    void mirrorImage(const platform::ui::ImageView& imageView);
+    void mirrorImage(const kit::ImageView& imageView);
     void useMeans(Means means);
 
-    std::weak_ptr<platform::ui::ImageView> _imageView;
+    std::weak_ptr<kit::ImageView> _imageView;
     Means _means = Means::None;
 };
 

@@ -8,52 +8,50 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 namespace {
 
 /// GTK's left end is where the text begins; the kit's Left is a side of the window.
-float horizontalAlign(ui::TextAlignment alignment, bool rightToLeft)
+float horizontalAlign(kit::TextAlignment alignment, bool rightToLeft)
 {
     switch (alignment) {
-    case ui::TextAlignment::Natural:
+    case kit::TextAlignment::Natural:
         return 0;
-    case ui::TextAlignment::Left:
+    case kit::TextAlignment::Left:
         return rightToLeft ? 1 : 0;
-    case ui::TextAlignment::Center:
+    case kit::TextAlignment::Center:
         return 0.5F;
-    case ui::TextAlignment::Right:
+    case kit::TextAlignment::Right:
         return rightToLeft ? 0 : 1;
     }
     return 0;
 }
 
-GtkJustification justification(ui::TextAlignment alignment)
+GtkJustification justification(kit::TextAlignment alignment)
 {
     switch (alignment) {
-    case ui::TextAlignment::Center:
+    case kit::TextAlignment::Center:
         return GTK_JUSTIFY_CENTER;
-    case ui::TextAlignment::Right:
+    case kit::TextAlignment::Right:
         return GTK_JUSTIFY_RIGHT;
     default:
         return GTK_JUSTIFY_LEFT;
     }
 }
 
-PangoEllipsizeMode ellipsis(const ui::Label& label)
+PangoEllipsizeMode ellipsis(const kit::Label& label)
 {
     switch (label.lineBreak()) {
-    case ui::LineBreak::TruncateMiddle:
+    case kit::LineBreak::TruncateMiddle:
         return PANGO_ELLIPSIZE_MIDDLE;
-    case ui::LineBreak::TruncateTail:
+    case kit::LineBreak::TruncateTail:
         return label.maxLines() == 0 ? PANGO_ELLIPSIZE_NONE : PANGO_ELLIPSIZE_END;
-    case ui::LineBreak::WordWrap:
+    case kit::LineBreak::WordWrap:
         return label.maxLines() > 1 ? PANGO_ELLIPSIZE_END : PANGO_ELLIPSIZE_NONE;
     }
     return PANGO_ELLIPSIZE_END;
 }
 
-TextLayout::Attributes attributesOf(const ui::Label& label, const Theme& theme)
+TextLayout::Attributes attributesOf(const kit::Label& label, const Theme& theme)
 {
     if (const auto& styled = label.attributedText())
         return TextLayout::attributes(theme, *styled, label.font());
@@ -61,14 +59,14 @@ TextLayout::Attributes attributesOf(const ui::Label& label, const Theme& theme)
     return TextLayout::attributes(theme, label.font(), color ? &*color : nullptr);
 }
 
-bool isDrawn(const ui::Label& label)
+bool isDrawn(const kit::Label& label)
 {
     return label.attributedText() && TextLayout::hasAttachments(*label.attributedText());
 }
 
 } // namespace
 
-void showLabel(GtkLabel* widget, const ui::Label& label, const Theme& theme)
+void showLabel(GtkLabel* widget, const kit::Label& label, const Theme& theme)
 {
     const bool wraps = label.maxLines() != 1;
     const bool rightToLeft = gtk_widget_get_direction(GTK_WIDGET(widget)) == GTK_TEXT_DIR_RTL;
@@ -84,18 +82,18 @@ void showLabel(GtkLabel* widget, const ui::Label& label, const Theme& theme)
     gtk_label_set_justify(widget, justification(label.alignment()));
 }
 
-LabelPeer::LabelPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::Label>& label)
+LabelPeer::LabelPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::Label>& label)
     : ViewPeer(std::move(context), label)
     , _label(label)
 {
     setNative(gtk_label_new(nullptr));
 }
 
-void LabelPeer::mirror(ui::View& shown, ui::ViewChanges changes)
+void LabelPeer::mirror(kit::View& shown, kit::ViewChanges changes)
 {
     ViewPeer::mirror(shown, changes);
     const auto label = _label.lock();
-    if (!label || !changes.contains(ui::ViewChange::Content))
+    if (!label || !changes.contains(kit::ViewChange::Content))
         return;
     showLabel(GTK_LABEL(native()), *label, context().theme());
     gtk_widget_set_opacity(native(), isDrawn(*label) ? 0 : 1);
@@ -112,7 +110,7 @@ void LabelPeer::canvasSnapshot(GtkSnapshot* snapshot)
     const auto pango = ObjectRef<PangoContext>::adopt(gtk_widget_create_pango_context(widget()));
     const auto layout = TextLayout::make(pango.get(), TextLayout::text(*label->attributedText()),
         attributesOf(*label, context().theme()), {width, label->maxLines()});
-    if (label->alignment() == ui::TextAlignment::Center)
+    if (label->alignment() == kit::TextAlignment::Center)
         pango_layout_set_alignment(layout.get(), PANGO_ALIGN_CENTER);
     PangoRectangle logical;
     pango_layout_get_pixel_extents(layout.get(), nullptr, &logical);

@@ -5,7 +5,7 @@
 
 #include "host/gtk/base/ViewPeer.h"
 
-namespace platform::ui {
+namespace kit {
 class Label;
 }
 
@@ -14,18 +14,18 @@ namespace host::gtk {
 /// A GtkLabel. A styled text with images is drawn by the peer, the label under it then only speaks.
 class LabelPeer : public ViewPeer {
 public:
-    LabelPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::Label>& label);
+    LabelPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::Label>& label);
 
     void canvasSnapshot(GtkSnapshot* snapshot) override;
 
 protected:
-    void mirror(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+    void mirror(kit::View& view, kit::ViewChanges changes) override;
 
 private:
-    std::weak_ptr<platform::ui::Label> _label;
+    std::weak_ptr<kit::Label> _label;
 };
 
 /// Makes a GtkLabel show what a label of the kit shows.
-void showLabel(GtkLabel* widget, const platform::ui::Label& label, const Theme& theme);
+void showLabel(GtkLabel* widget, const kit::Label& label, const Theme& theme);
 
 } // namespace host::gtk

@@ -12,8 +12,6 @@
 
 namespace {
 
-namespace ui = platform::ui;
-
 constexpr int iconSize = 40, smallIconSize = 16;
 constexpr float markMargin = 8; ///< beside a check mark a finger still means it
 constexpr int dotDiameter = 10, dotStep = 7; ///< dots of several tags overlap
@@ -26,7 +24,7 @@ struct TrwListRow {
     GtkListItem* item; ///< owns this widget
     GtkWidget* parts[partCount]; ///< made when a row first needs them: 205 rows live beside the visible ones
     GtkWidget *title, *detail;
-    ui::ListRow* shown;
+    kit::ListRow* shown;
     host::gtk::ListRowWidget::Handler* handler;
     bool isFilled;
 };
@@ -196,27 +194,27 @@ GtkWidget* showPart(TrwListRow* row, Part part, bool wanted)
 
 void trw_list_row_init(TrwListRow* row)
 {
-    row->shown = new ui::ListRow();
+    row->shown = new kit::ListRow();
     // A name of many combining marks is higher than any row.
     gtk_widget_set_overflow(GTK_WIDGET(row), GTK_OVERFLOW_HIDDEN);
 }
 
-void showTexts(TrwListRow* row, const ui::ListRow& content)
+void showTexts(TrwListRow* row, const kit::ListRow& content)
 {
     gtk_label_set_label(GTK_LABEL(row->title), content.title.c_str());
     gtk_label_set_label(GTK_LABEL(row->detail), content.detail.c_str());
     gtk_widget_set_visible(row->detail, !content.detail.empty());
 }
 
-void showMarks(TrwListRow* row, const ui::ListRow& content)
+void showMarks(TrwListRow* row, const kit::ListRow& content)
 {
-    const bool isEditing = content.check != ui::CheckState::None;
+    const bool isEditing = content.check != kit::CheckState::None;
     if (auto* check = showPart(row, Check, isEditing))
-        gtk_check_button_set_active(GTK_CHECK_BUTTON(check), content.check == ui::CheckState::On);
-    showPart(row, Download, content.download == ui::DownloadState::InCloud);
-    if (auto* progress = showPart(row, Progress, content.download == ui::DownloadState::Downloading))
+        gtk_check_button_set_active(GTK_CHECK_BUTTON(check), content.check == kit::CheckState::On);
+    showPart(row, Download, content.download == kit::DownloadState::InCloud);
+    if (auto* progress = showPart(row, Progress, content.download == kit::DownloadState::Downloading))
         gtk_widget_queue_draw(progress);
-    showPart(row, Chevron, content.accessory == ui::RowAccessory::Disclosure && !isEditing);
+    showPart(row, Chevron, content.accessory == kit::RowAccessory::Disclosure && !isEditing);
     const int count = static_cast<int>(content.tagColors.size());
     if (auto* dots = showPart(row, Dots, count > 0)) {
         gtk_drawing_area_set_content_width(
@@ -225,14 +223,14 @@ void showMarks(TrwListRow* row, const ui::ListRow& content)
     }
 }
 
-void showIcon(TrwListRow* row, const ui::ListRow& content)
+void showIcon(TrwListRow* row, const kit::ListRow& content)
 {
     auto* icon = showPart(row, Icon, content.image.has_value());
     if (content.image)
         host::gtk::ImagePaint::show(GTK_IMAGE(icon), *content.image, iconSize);
 }
 
-void showStyle(TrwListRow* row, const ui::ListRow& content)
+void showStyle(TrwListRow* row, const kit::ListRow& content)
 {
     const auto setClass = [row](const char* name, bool wanted) {
         if (wanted)
@@ -240,12 +238,12 @@ void showStyle(TrwListRow* row, const ui::ListRow& content)
         else
             gtk_widget_remove_css_class(GTK_WIDGET(row), name);
     };
-    setClass("section", content.kind == ui::RowKind::SectionHeader);
+    setClass("section", content.kind == kit::RowKind::SectionHeader);
     setClass("dimmed", content.isDimmed);
-    gtk_list_item_set_activatable(row->item, content.kind == ui::RowKind::Item);
+    gtk_list_item_set_activatable(row->item, content.kind == kit::RowKind::Item);
 }
 
-void showAccessible(TrwListRow* row, const ui::ListRow& content)
+void showAccessible(TrwListRow* row, const kit::ListRow& content)
 {
     std::string name = content.accessibleDescription;
     if (name.empty())
@@ -255,11 +253,11 @@ void showAccessible(TrwListRow* row, const ui::ListRow& content)
     if (auto* place = gtk_widget_get_parent(GTK_WIDGET(row)))
         gtk_accessible_update_property(
             GTK_ACCESSIBLE(place), GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
-    if (content.check == ui::CheckState::None)
+    if (content.check == kit::CheckState::None)
         gtk_accessible_reset_state(GTK_ACCESSIBLE(row), GTK_ACCESSIBLE_STATE_PRESSED);
     else
         gtk_accessible_update_state(GTK_ACCESSIBLE(row), GTK_ACCESSIBLE_STATE_PRESSED,
-            content.check == ui::CheckState::On ? GTK_ACCESSIBLE_TRISTATE_TRUE
+            content.check == kit::CheckState::On ? GTK_ACCESSIBLE_TRISTATE_TRUE
                                                 : GTK_ACCESSIBLE_TRISTATE_FALSE,
             -1);
 }
@@ -286,7 +284,7 @@ void reserve(GtkWidget* row, double height)
     gtk_widget_set_size_request(row, -1, static_cast<int>(height));
 }
 
-void show(GtkWidget* widget, const ui::ListRow& content, double height)
+void show(GtkWidget* widget, const kit::ListRow& content, double height)
 {
     auto* row = rowOf(widget);
     reserve(widget, height);
@@ -304,7 +302,7 @@ void show(GtkWidget* widget, const ui::ListRow& content, double height)
     row->isFilled = true;
 }
 
-const ui::ListRow& shown(GtkWidget* row)
+const kit::ListRow& shown(GtkWidget* row)
 {
     return *rowOf(row)->shown;
 }

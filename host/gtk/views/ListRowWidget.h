@@ -24,8 +24,8 @@ bool isRow(GtkWidget* widget);
 /// Takes the room of a row that is shown later.
 void reserve(GtkWidget* row, double height);
 /// Shows a row; cheap when it is what the widget shows already.
-void show(GtkWidget* row, const platform::ui::ListRow& content, double height);
-const platform::ui::ListRow& shown(GtkWidget* row);
+void show(GtkWidget* row, const kit::ListRow& content, double height);
+const kit::ListRow& shown(GtkWidget* row);
 guint position(GtkWidget* row);
 /// Whether a point of the row, in its own coordinates, lies on the check mark or before it.
 bool isOnMark(GtkWidget* row, double x);

@@ -10,8 +10,6 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 namespace {
 
 /// How many rows that nobody sees are filled in one frame, so that a frame stays a frame.
@@ -19,7 +17,7 @@ constexpr std::size_t rowsInAFrame = 6;
 /// Rows beside the seen ones that are filled with them: a layout that is a little late shows no empty row.
 constexpr std::size_t seenMargin = 2;
 
-bool isSeen(const ui::ListView& list, std::size_t row)
+bool isSeen(const kit::ListView& list, std::size_t row)
 {
     const auto visible = list.visibleRows();
     return row + seenMargin >= visible.first && row < visible.end() + seenMargin;

@@ -15,8 +15,6 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 namespace {
 
 constexpr auto noModifiers = static_cast<GdkModifierType>(0);
@@ -31,15 +29,15 @@ bool isWith(GdkModifierType modifiers, GdkModifierType wanted)
 struct CommandKey {
     guint key;
     GdkModifierType modifiers;
-    ui::RowCommand command;
+    kit::RowCommand command;
 };
 
 constexpr CommandKey commandKeys[] = {
-    {GDK_KEY_F2, noModifiers, ui::RowCommand::Rename},
-    {GDK_KEY_Delete, noModifiers, ui::RowCommand::Delete},
-    {GDK_KEY_KP_Delete, noModifiers, ui::RowCommand::Delete},
-    {GDK_KEY_Return, GDK_ALT_MASK, ui::RowCommand::Info},
-    {GDK_KEY_space, noModifiers, ui::RowCommand::Peek},
+    {GDK_KEY_F2, noModifiers, kit::RowCommand::Rename},
+    {GDK_KEY_Delete, noModifiers, kit::RowCommand::Delete},
+    {GDK_KEY_KP_Delete, noModifiers, kit::RowCommand::Delete},
+    {GDK_KEY_Return, GDK_ALT_MASK, kit::RowCommand::Info},
+    {GDK_KEY_space, noModifiers, kit::RowCommand::Peek},
 };
 
 /// Whether a key goes somewhere or does something, and so ends what is being typed.
@@ -123,7 +121,7 @@ bool ListViewPeer::rowKeyPressed(std::size_t row, guint key, GdkModifierType mod
     const bool isTyping = _typeAhead.isActive(platform::services().dispatch().now());
     if (key == GDK_KEY_space && isTyping)
         return false;
-    if (key == GDK_KEY_space && list->selectionMode() == ui::SelectionMode::Multiple) {
+    if (key == GDK_KEY_space && list->selectionMode() == kit::SelectionMode::Multiple) {
         list->activateRow(row);
         return true;
     }

@@ -11,8 +11,6 @@
 #include <cmath>
 
 namespace host::gtk {
-
-namespace ui = platform::ui;
 using platform::Point;
 
 namespace {
@@ -82,7 +80,7 @@ void ListViewPeer::connectMarks()
         auto* row = rowAt(startX, startY + y);
         const auto list = _list.lock();
         const bool hasMoved = std::hypot(x, y) >= markDragStart;
-        if (list && row && hasMoved && list->selectionMode() == ui::SelectionMode::Multiple)
+        if (list && row && hasMoved && list->selectionMode() == kit::SelectionMode::Multiple)
             list->extendSelectionTo(ListRowWidget::position(row));
     }));
 }

@@ -11,8 +11,6 @@
 #include <cmath>
 
 namespace host::gtk {
-
-namespace ui = platform::ui;
 using platform::Point;
 
 namespace {
@@ -38,9 +36,9 @@ std::shared_ptr<Observer> observing(Peer& peer)
 /// What two lines of text and the margins around them need, which with large text is more than the usual.
 double rowHeightForTexts()
 {
-    const double lines = ui::Font::preferred(ui::TextStyle::Body).lineHeight()
-        + ui::Font::preferred(ui::TextStyle::Footnote).lineHeight();
-    return std::max(ui::ListView::defaultRowHeight, std::ceil(lines + 2 * textMargin));
+    const double lines = kit::Font::preferred(kit::TextStyle::Body).lineHeight()
+        + kit::Font::preferred(kit::TextStyle::Footnote).lineHeight();
+    return std::max(kit::ListView::defaultRowHeight, std::ceil(lines + 2 * textMargin));
 }
 
 /// A menu takes the pointer, so that the toolkit never sees the end of the press that opened it: the row
@@ -51,7 +49,7 @@ void endPress(GtkWidget* pressed)
         gtk_widget_unset_state_flags(widget, GTK_STATE_FLAG_ACTIVE);
 }
 
-std::size_t rowCountBefore(const ui::ListView& list, const ui::ListChanges& changes)
+std::size_t rowCountBefore(const kit::ListView& list, const kit::ListChanges& changes)
 {
     std::size_t count = list.rowCount();
     for (const auto& splice : changes.splices)
@@ -60,16 +58,16 @@ std::size_t rowCountBefore(const ui::ListView& list, const ui::ListChanges& chan
 }
 
 /// Whether a row that stayed shows something else.
-bool showsAnew(const ui::ListChanges& changes, std::size_t row)
+bool showsAnew(const kit::ListChanges& changes, std::size_t row)
 {
     const auto after = std::ranges::upper_bound(
-        changes.changed, row, {}, [](const ui::RowRange& range) { return range.first; });
+        changes.changed, row, {}, [](const kit::RowRange& range) { return range.first; });
     return after != changes.changed.begin() && std::prev(after)->contains(row);
 }
 
 /// Few enough splices that leave the rows with widgets alone, or at least those that are seen: a row that
 /// goes and comes again has to be filled again.
-std::vector<ui::ListSplice> splicesToTell(const ui::RowRange& visible, const ui::ListChanges& changes)
+std::vector<kit::ListSplice> splicesToTell(const kit::RowRange& visible, const kit::ListChanges& changes)
 {
     if (changes.splices.size() <= mostSplices)
         return changes.splices;
@@ -81,7 +79,7 @@ std::vector<ui::ListSplice> splicesToTell(const ui::RowRange& visible, const ui:
 
 } // namespace
 
-ListViewPeer::ListViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::ListView>& list)
+ListViewPeer::ListViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ListView>& list)
     : ViewPeer(std::move(context), list)
     , _list(list)
     , _rows(RowModel::make())
@@ -223,7 +221,7 @@ void ListViewPeer::activated(guint position)
     if (!list || _hasStrayed)
         return;
     const auto keepsSelf = shared_from_this();
-    if (list->selectionMode() == ui::SelectionMode::Multiple && isShiftHeld())
+    if (list->selectionMode() == kit::SelectionMode::Multiple && isShiftHeld())
         list->extendSelectionTo(position);
     else
         list->activateRow(position);
@@ -268,16 +266,16 @@ bool ListViewPeer::grabFocus()
     return gtk_widget_grab_focus(_listWidget);
 }
 
-void ListViewPeer::mirror(ui::View& shown, ui::ViewChanges changes)
+void ListViewPeer::mirror(kit::View& shown, kit::ViewChanges changes)
 {
     ViewPeer::mirror(shown, changes);
     const auto list = _list.lock();
-    if (!list || !changes.contains(ui::ViewChange::Content))
+    if (!list || !changes.contains(kit::ViewChange::Content))
         return;
     if (const double height = rowHeightForTexts(); height != list->rowHeight())
         list->setRowHeight(height);
-    list->setScrollObserver(observing<ui::ScrollObserver>(*this));
-    list->setListObserver(observing<ui::ListViewObserver>(*this));
+    list->setScrollObserver(observing<kit::ScrollObserver>(*this));
+    list->setListObserver(observing<kit::ListViewObserver>(*this));
     showRows(list->rowCount());
     fillAllSoon();
     refreshStateDidChange(*list);
@@ -310,7 +308,7 @@ void ListViewPeer::growRows()
         context().scheduler().scheduleNextFrame(&_growKey, [this] { growRows(); });
 }
 
-void ListViewPeer::rowsWereReset(ui::ListView& list)
+void ListViewPeer::rowsWereReset(kit::ListView& list)
 {
     auto* focused = focusedRow();
     const auto focusedAt = focused ? std::optional(ListRowWidget::position(focused)) : std::nullopt;
@@ -321,7 +319,7 @@ void ListViewPeer::rowsWereReset(ui::ListView& list)
         focusSoon(std::min<std::size_t>(*focusedAt, list.rowCount() - 1), focusFrames);
 }
 
-void ListViewPeer::rowsDidChange(ui::ListView& list, const ui::ListChanges& changes)
+void ListViewPeer::rowsDidChange(kit::ListView& list, const kit::ListChanges& changes)
 {
     auto* focused = focusedRow();
     const auto focusedAt = focused ? std::optional(ListRowWidget::position(focused)) : std::nullopt;
@@ -336,7 +334,7 @@ void ListViewPeer::rowsDidChange(ui::ListView& list, const ui::ListChanges& chan
         focusSoon(std::min<std::size_t>(*focusedAt, list.rowCount() - 1), focusFrames);
 }
 
-void ListViewPeer::splice(const ui::ListView& list, const ui::ListChanges& changes)
+void ListViewPeer::splice(const kit::ListView& list, const kit::ListChanges& changes)
 {
     _isSplicing = true;
     for (const auto& splice : splicesToTell(list.visibleRows(), changes)) {
@@ -354,7 +352,7 @@ void ListViewPeer::splice(const ui::ListView& list, const ui::ListChanges& chang
 }
 
 /// The objects of the rows in a range that have widgets.
-std::vector<ObjectRef<GObject>> ListViewPeer::rowObjects(const ui::RowRange& range) const
+std::vector<ObjectRef<GObject>> ListViewPeer::rowObjects(const kit::RowRange& range) const
 {
     std::vector<ObjectRef<GObject>> objects;
     for (auto* item : _live) {
@@ -364,7 +362,7 @@ std::vector<ObjectRef<GObject>> ListViewPeer::rowObjects(const ui::RowRange& ran
     return objects;
 }
 
-void ListViewPeer::rowDidChange(ui::ListView&, std::size_t index)
+void ListViewPeer::rowDidChange(kit::ListView&, std::size_t index)
 {
     for (auto* item : _live) {
         if (gtk_list_item_get_position(item) == index)
@@ -373,12 +371,12 @@ void ListViewPeer::rowDidChange(ui::ListView&, std::size_t index)
     fillLater();
 }
 
-void ListViewPeer::selectionDidChange(ui::ListView&)
+void ListViewPeer::selectionDidChange(kit::ListView&)
 {
     fillAllSoon();
 }
 
-void ListViewPeer::scrollTo(ui::ScrollView& view, Point offset, bool /*animated*/)
+void ListViewPeer::scrollTo(kit::ScrollView& view, Point offset, bool /*animated*/)
 {
     moveTo(offset.y + view.contentInsets().top, layoutFrames);
 }
@@ -400,23 +398,23 @@ void ListViewPeer::moveTo(double value, int frames)
         &_scrollKey, [this, value, frames] { moveTo(value, frames - 1); });
 }
 
-void ListViewPeer::scrollExtentDidChange(ui::ScrollView&) { }
+void ListViewPeer::scrollExtentDidChange(kit::ScrollView&) { }
 
 void ListViewPeer::scrollToRow(
-    ui::ListView& list, std::size_t index, ui::RowPosition position, bool /*animated*/)
+    kit::ListView& list, std::size_t index, kit::RowPosition position, bool /*animated*/)
 {
     auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
     const double page = gtk_adjustment_get_page_size(adjustment), height = list.rowHeight();
     const double top = static_cast<double>(index) * height, now = gtk_adjustment_get_value(adjustment);
     double wanted = std::clamp(now, top + height - page, top);
-    if (position == ui::RowPosition::Top)
+    if (position == kit::RowPosition::Top)
         wanted = top;
-    else if (position == ui::RowPosition::Middle)
+    else if (position == kit::RowPosition::Middle)
         wanted = top - (page - height) / 2;
     moveTo(std::max(0.0, wanted), layoutFrames);
 }
 
-void ListViewPeer::focusRow(ui::ListView&, std::size_t index)
+void ListViewPeer::focusRow(kit::ListView&, std::size_t index)
 {
     focusSoon(index, focusFrames);
 }
@@ -435,7 +433,7 @@ void ListViewPeer::focusSoon(std::size_t index, int frames)
             &_focusKey, [this, index, frames] { focusSoon(index, frames - 1); });
 }
 
-void ListViewPeer::refreshStateDidChange(ui::ListView& list)
+void ListViewPeer::refreshStateDidChange(kit::ListView& list)
 {
     gtk_spinner_set_spinning(GTK_SPINNER(_spinner), list.isRefreshing());
     gtk_revealer_set_reveal_child(GTK_REVEALER(_refresher), list.isRefreshing());

@@ -14,22 +14,22 @@ namespace host::gtk {
 
 /// A GtkListView over a lazy model: only rows near the visible ones have widgets.
 class ListViewPeer : public ViewPeer,
-                     public platform::ui::ScrollObserver,
-                     public platform::ui::ListViewObserver {
+                     public kit::ScrollObserver,
+                     public kit::ListViewObserver {
 public:
-    ListViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::ListView>& list);
+    ListViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ListView>& list);
     ~ListViewPeer() override;
 
-    void scrollTo(platform::ui::ScrollView& view, platform::Point offset, bool animated) override;
-    void scrollExtentDidChange(platform::ui::ScrollView& view) override;
-    void rowsWereReset(platform::ui::ListView& list) override;
-    void rowsDidChange(platform::ui::ListView& list, const platform::ui::ListChanges& changes) override;
-    void rowDidChange(platform::ui::ListView& list, std::size_t index) override;
-    void selectionDidChange(platform::ui::ListView& list) override;
-    void scrollToRow(platform::ui::ListView& list, std::size_t index, platform::ui::RowPosition position,
+    void scrollTo(kit::ScrollView& view, platform::Point offset, bool animated) override;
+    void scrollExtentDidChange(kit::ScrollView& view) override;
+    void rowsWereReset(kit::ListView& list) override;
+    void rowsDidChange(kit::ListView& list, const kit::ListChanges& changes) override;
+    void rowDidChange(kit::ListView& list, std::size_t index) override;
+    void selectionDidChange(kit::ListView& list) override;
+    void scrollToRow(kit::ListView& list, std::size_t index, kit::RowPosition position,
         bool animated) override;
-    void focusRow(platform::ui::ListView& list, std::size_t index) override;
-    void refreshStateDidChange(platform::ui::ListView& list) override;
+    void focusRow(kit::ListView& list, std::size_t index) override;
+    void refreshStateDidChange(kit::ListView& list) override;
 
     bool grabFocus() override;
     GtkWidget* listWidget() const { return _listWidget; }
@@ -40,7 +40,7 @@ protected:
     GtkWidget* spoken() const override { return _listWidget; }
     GtkWidget* childContainer() const override { return widget(); }
     platform::Point childOrigin() const override { return {}; }
-    void mirror(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+    void mirror(kit::View& view, kit::ViewChanges changes) override;
 
 private:
     void buildWidgets();
@@ -57,8 +57,8 @@ private:
     /// Lets the widgets know of as many rows as a frame can make widgets for, and of more in the next frames.
     void showRows(std::size_t count);
     void growRows();
-    std::vector<ObjectRef<GObject>> rowObjects(const platform::ui::RowRange& range) const;
-    void splice(const platform::ui::ListView& list, const platform::ui::ListChanges& changes);
+    std::vector<ObjectRef<GObject>> rowObjects(const kit::RowRange& range) const;
+    void splice(const kit::ListView& list, const kit::ListChanges& changes);
     /// Scrolls, at the latest after so many frames.
     void moveTo(double value, int frames);
     /// Rows that are seen are filled at once, those beside them a few in each frame.
@@ -86,14 +86,14 @@ private:
     /// Gives the keyboard to a row as soon as it has a widget.
     void focusSoon(std::size_t index, int frames);
 
-    std::weak_ptr<platform::ui::ListView> _list;
+    std::weak_ptr<kit::ListView> _list;
     ObjectRef<GListModel> _rows;
     GtkWidget *_listWidget = nullptr, *_window = nullptr, *_refresher = nullptr, *_spinner = nullptr;
     std::unordered_set<GtkListItem*> _live;
     std::unordered_set<GtkListItem*> _unfilled; ///< of those, the ones that do not show their rows yet
     bool _isSplicing = false; ///< rows are not at their final places
     SignalConnection _onScroll;
-    platform::ui::TypeAhead _typeAhead;
+    kit::TypeAhead _typeAhead;
     platform::Point _fingerStart; ///< where the first came down
     int _fingers = 0; ///< that are down
     bool _hasStrayed = false; ///< they open no row

@@ -20,26 +20,24 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 namespace {
 
-class PeerFactory : public ui::ViewVisitor {
+class PeerFactory : public kit::ViewVisitor {
 public:
     explicit PeerFactory(const std::shared_ptr<PeerContext>& context)
         : _context(context)
     {
     }
 
-    void visit(ui::View& view) override { make<ViewPeer>(view); }
-    void visit(ui::Label& view) override { make<LabelPeer>(view); }
-    void visit(ui::ImageView& view) override { make<ImageViewPeer>(view); }
-    void visit(ui::Button& view) override { make<ButtonPeer>(view); }
-    void visit(ui::TextField& view) override { make<TextFieldPeer>(view); }
-    void visit(ui::ScrollView& view) override { make<ScrollViewPeer>(view); }
-    void visit(ui::ListView& view) override { make<ListViewPeer>(view); }
-    void visit(ui::ActivityIndicator& view) override { make<ActivityIndicatorPeer>(view); }
-    void visit(ui::HostedView& view) override { make<HostedViewPeer>(view); }
+    void visit(kit::View& view) override { make<ViewPeer>(view); }
+    void visit(kit::Label& view) override { make<LabelPeer>(view); }
+    void visit(kit::ImageView& view) override { make<ImageViewPeer>(view); }
+    void visit(kit::Button& view) override { make<ButtonPeer>(view); }
+    void visit(kit::TextField& view) override { make<TextFieldPeer>(view); }
+    void visit(kit::ScrollView& view) override { make<ScrollViewPeer>(view); }
+    void visit(kit::ListView& view) override { make<ListViewPeer>(view); }
+    void visit(kit::ActivityIndicator& view) override { make<ActivityIndicatorPeer>(view); }
+    void visit(kit::HostedView& view) override { make<HostedViewPeer>(view); }
 
     std::shared_ptr<ViewPeer> peer;
 
@@ -56,7 +54,7 @@ private:
 } // namespace
 
 std::shared_ptr<ViewPeer> makePeer(
-    const std::shared_ptr<PeerContext>& context, const std::shared_ptr<ui::View>& view)
+    const std::shared_ptr<PeerContext>& context, const std::shared_ptr<kit::View>& view)
 {
     PeerFactory factory(context);
     view->accept(factory);

@@ -4,8 +4,6 @@
 #include "host/gtk/views/ScrollViewPeer.h"
 
 namespace host::gtk {
-
-namespace ui = platform::ui;
 using platform::Point;
 using platform::Size;
 
@@ -38,7 +36,7 @@ private:
 };
 
 ScrollViewPeer::ScrollViewPeer(
-    std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::ScrollView>& scrollView)
+    std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ScrollView>& scrollView)
     : ViewPeer(std::move(context), scrollView)
     , _scrollView(scrollView)
     , _content(ObjectRef<GtkWidget>::retain(CanvasWidget::make(GTK_ACCESSIBLE_ROLE_GROUP)))
@@ -72,7 +70,7 @@ void ScrollViewPeer::adjusted()
         gtk_adjustment_get_value(gtk_scrolled_window_get_vadjustment(window)) - insets.top});
 }
 
-void ScrollViewPeer::scrollTo(ui::ScrollView& view, Point offset, bool /*animated*/)
+void ScrollViewPeer::scrollTo(kit::ScrollView& view, Point offset, bool /*animated*/)
 {
     const SignalBlock horizontal(_onHorizontal), vertical(_onVertical);
     auto* window = GTK_SCROLLED_WINDOW(native());
@@ -81,9 +79,9 @@ void ScrollViewPeer::scrollTo(ui::ScrollView& view, Point offset, bool /*animate
     gtk_adjustment_set_value(gtk_scrolled_window_get_vadjustment(window), offset.y + insets.top);
 }
 
-void ScrollViewPeer::scrollExtentDidChange(ui::ScrollView& view)
+void ScrollViewPeer::scrollExtentDidChange(kit::ScrollView& view)
 {
-    viewDidChange(view, ui::ViewChange::IntrinsicSize);
+    viewDidChange(view, kit::ViewChange::IntrinsicSize);
 }
 
 Point ScrollViewPeer::childOrigin() const
@@ -92,22 +90,22 @@ Point ScrollViewPeer::childOrigin() const
     return view ? Point{view->contentInsets().left, view->contentInsets().top} : Point();
 }
 
-void ScrollViewPeer::mirror(ui::View& shown, ui::ViewChanges changes)
+void ScrollViewPeer::mirror(kit::View& shown, kit::ViewChanges changes)
 {
     const auto view = _scrollView.lock();
     if (!view)
         return;
     // The widget scrolls by itself: a new origin of the bounds moves no child.
     ViewPeer::mirror(shown, changes);
-    if (changes.contains(ui::ViewChange::IntrinsicSize)) {
+    if (changes.contains(kit::ViewChange::IntrinsicSize)) {
         mirrorBehavior(*view);
         gtk_widget_queue_resize(_content.get());
     }
     view->setScrollObserver(
-        std::shared_ptr<ui::ScrollObserver>(shared_from_this(), static_cast<ui::ScrollObserver*>(this)));
+        std::shared_ptr<kit::ScrollObserver>(shared_from_this(), static_cast<kit::ScrollObserver*>(this)));
 }
 
-void ScrollViewPeer::mirrorBehavior(const ui::ScrollView& view)
+void ScrollViewPeer::mirrorBehavior(const kit::ScrollView& view)
 {
     const auto& behavior = view.scrollBehavior();
     const auto policy = [](bool shows) { return shows ? GTK_POLICY_AUTOMATIC : GTK_POLICY_EXTERNAL; };

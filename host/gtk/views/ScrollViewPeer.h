@@ -9,26 +9,26 @@
 namespace host::gtk {
 
 /// A GtkScrolledWindow around a canvas of the content's size.
-class ScrollViewPeer : public ViewPeer, public platform::ui::ScrollObserver {
+class ScrollViewPeer : public ViewPeer, public kit::ScrollObserver {
 public:
     ScrollViewPeer(
-        std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::ScrollView>& scrollView);
+        std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ScrollView>& scrollView);
     ~ScrollViewPeer() override;
 
-    void scrollTo(platform::ui::ScrollView& view, platform::Point offset, bool animated) override;
-    void scrollExtentDidChange(platform::ui::ScrollView& view) override;
+    void scrollTo(kit::ScrollView& view, platform::Point offset, bool animated) override;
+    void scrollExtentDidChange(kit::ScrollView& view) override;
 
 protected:
     GtkWidget* childContainer() const override { return _content.get(); }
     platform::Point childOrigin() const override;
-    void mirror(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+    void mirror(kit::View& view, kit::ViewChanges changes) override;
 
 private:
     class Content;
     void adjusted();
-    void mirrorBehavior(const platform::ui::ScrollView& view);
+    void mirrorBehavior(const kit::ScrollView& view);
 
-    std::weak_ptr<platform::ui::ScrollView> _scrollView;
+    std::weak_ptr<kit::ScrollView> _scrollView;
     ObjectRef<GtkWidget> _content;
     std::unique_ptr<Content> _contentClient;
     SignalConnection _onHorizontal, _onVertical;

@@ -10,11 +10,9 @@
 
 namespace host::gtk {
 
-namespace ui = platform::ui;
-
 namespace {
 
-ui::TextRange selectionOf(GtkEditable* editable)
+kit::TextRange selectionOf(GtkEditable* editable)
 {
     int start = 0, end = 0;
     if (!gtk_editable_get_selection_bounds(editable, &start, &end))
@@ -22,14 +20,14 @@ ui::TextRange selectionOf(GtkEditable* editable)
     return {static_cast<std::size_t>(start), static_cast<std::size_t>(end - start)};
 }
 
-GtkInputHints hints(const ui::TextInputTraits& traits)
+GtkInputHints hints(const kit::TextInputTraits& traits)
 {
     int hints = GTK_INPUT_HINT_NONE;
-    if (traits.autocorrection == ui::Autocorrection::Off)
+    if (traits.autocorrection == kit::Autocorrection::Off)
         hints |= GTK_INPUT_HINT_NO_SPELLCHECK;
-    if (traits.capitalization == ui::Capitalization::Words)
+    if (traits.capitalization == kit::Capitalization::Words)
         hints |= GTK_INPUT_HINT_UPPERCASE_WORDS;
-    else if (traits.capitalization == ui::Capitalization::Sentences)
+    else if (traits.capitalization == kit::Capitalization::Sentences)
         hints |= GTK_INPUT_HINT_UPPERCASE_SENTENCES;
     return static_cast<GtkInputHints>(hints);
 }
@@ -37,7 +35,7 @@ GtkInputHints hints(const ui::TextInputTraits& traits)
 } // namespace
 
 TextFieldPeer::TextFieldPeer(
-    std::shared_ptr<PeerContext> context, const std::shared_ptr<ui::TextField>& field)
+    std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::TextField>& field)
     : ViewPeer(std::move(context), field)
     , _field(field)
 {
@@ -97,19 +95,19 @@ void TextFieldPeer::returnPressed()
         _onReturn();
 }
 
-void TextFieldPeer::mirror(ui::View& shown, ui::ViewChanges changes)
+void TextFieldPeer::mirror(kit::View& shown, kit::ViewChanges changes)
 {
     ViewPeer::mirror(shown, changes);
     const auto field = _field.lock();
     if (!field)
         return;
-    if (changes.contains(ui::ViewChange::Content))
+    if (changes.contains(kit::ViewChange::Content))
         mirrorContent(*field);
-    if (changes.contains(ui::ViewChange::Content) || changes.contains(ui::ViewChange::Selection))
+    if (changes.contains(kit::ViewChange::Content) || changes.contains(kit::ViewChange::Selection))
         mirrorText(*field);
 }
 
-void TextFieldPeer::mirrorContent(const ui::TextField& field)
+void TextFieldPeer::mirrorContent(const kit::TextField& field)
 {
     auto* entry = GTK_ENTRY(native());
     const auto& traits = field.inputTraits();
@@ -118,17 +116,17 @@ void TextFieldPeer::mirrorContent(const ui::TextField& field)
     gtk_entry_set_attributes(entry, TextLayout::attributes(context().theme(), field.font(), nullptr).get());
     mirrorClearButton(field);
     gtk_editable_set_alignment(
-        GTK_EDITABLE(entry), field.alignment() == ui::TextAlignment::Center ? 0.5F : 0.0F);
+        GTK_EDITABLE(entry), field.alignment() == kit::TextAlignment::Center ? 0.5F : 0.0F);
     const auto& label = field.accessibility().label;
     const auto& name = label.empty() ? field.placeholder() : label;
     if (!name.empty())
         setAccessibleName(name);
 }
 
-void TextFieldPeer::mirrorClearButton(const ui::TextField& field)
+void TextFieldPeer::mirrorClearButton(const kit::TextField& field)
 {
     const bool clears =
-        field.inputTraits().clearButton == ui::ClearButton::WhileEditing && !field.text().empty();
+        field.inputTraits().clearButton == kit::ClearButton::WhileEditing && !field.text().empty();
     gtk_entry_set_icon_from_icon_name(
         GTK_ENTRY(native()), GTK_ENTRY_ICON_SECONDARY, clears ? "edit-clear-symbolic" : nullptr);
 }
@@ -138,7 +136,7 @@ void TextFieldPeer::setAccessibleName(const std::string& name)
     gtk_accessible_update_property(GTK_ACCESSIBLE(native()), GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
 }
 
-void TextFieldPeer::mirrorText(const ui::TextField& field)
+void TextFieldPeer::mirrorText(const kit::TextField& field)
 {
     const SignalBlock changed(_onChanged), cursor(_onCursor), bound(_onBound);
     auto* editable = GTK_EDITABLE(native());
@@ -159,11 +157,11 @@ bool TextFieldPeer::grabFocus()
     return taken;
 }
 
-std::optional<platform::Size> TextFieldPeer::nativeSize(const ui::View&, double /*maxWidth*/)
+std::optional<platform::Size> TextFieldPeer::nativeSize(const kit::View&, double /*maxWidth*/)
 {
     int height = 0;
     gtk_widget_measure(native(), GTK_ORIENTATION_VERTICAL, -1, nullptr, &height, nullptr, nullptr);
-    return platform::Size{ui::View::noIntrinsicMetric, static_cast<double>(height)};
+    return platform::Size{kit::View::noIntrinsicMetric, static_cast<double>(height)};
 }
 
 } // namespace host::gtk

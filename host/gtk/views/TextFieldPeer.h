@@ -5,7 +5,7 @@
 
 #include "host/gtk/base/ViewPeer.h"
 
-namespace platform::ui {
+namespace kit {
 class TextField;
 }
 
@@ -15,29 +15,29 @@ namespace host::gtk {
 class TextFieldPeer : public ViewPeer {
 public:
     TextFieldPeer(
-        std::shared_ptr<PeerContext> context, const std::shared_ptr<platform::ui::TextField>& field);
+        std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::TextField>& field);
 
     bool grabFocus() override;
     /// The entry's own height: the theme wants more room around a text than a line of it.
-    std::optional<platform::Size> nativeSize(const platform::ui::View& view, double maxWidth) override;
+    std::optional<platform::Size> nativeSize(const kit::View& view, double maxWidth) override;
     /// What the entry is called where neither its label nor its placeholder says so.
     void setAccessibleName(const std::string& name);
     /// Called when the return key was pressed and the field's delegate did not object.
     void setOnReturn(std::function<void()> callback) { _onReturn = std::move(callback); }
 
 protected:
-    void mirror(platform::ui::View& view, platform::ui::ViewChanges changes) override;
+    void mirror(kit::View& view, kit::ViewChanges changes) override;
 
 private:
     void connectEvents();
     void edited();
     void selectionMoved();
     void returnPressed();
-    void mirrorContent(const platform::ui::TextField& field);
-    void mirrorClearButton(const platform::ui::TextField& field);
-    void mirrorText(const platform::ui::TextField& field);
+    void mirrorContent(const kit::TextField& field);
+    void mirrorClearButton(const kit::TextField& field);
+    void mirrorText(const kit::TextField& field);
 
-    std::weak_ptr<platform::ui::TextField> _field;
+    std::weak_ptr<kit::TextField> _field;
     SignalConnection _onChanged, _onCursor, _onBound;
     std::function<void()> _onReturn;
 };

@@ -19,8 +19,8 @@
 
 namespace testing_support {
 
-using platform::components::DocumentListController;
-using platform::ui::Window;
+using screens::DocumentListController;
+using kit::Window;
 
 namespace {
 
@@ -110,9 +110,9 @@ std::vector<std::string> BrowserFixture::stack() const
     return names;
 }
 
-std::shared_ptr<platform::ui::AlertController> BrowserFixture::alert() const
+std::shared_ptr<kit::AlertController> BrowserFixture::alert() const
 {
-    return std::dynamic_pointer_cast<platform::ui::AlertController>(browser->presentedViewController());
+    return std::dynamic_pointer_cast<kit::AlertController>(browser->presentedViewController());
 }
 
 std::string BrowserFixture::itemsText(std::size_t count)

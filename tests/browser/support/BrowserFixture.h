@@ -19,13 +19,13 @@
 #include <string_view>
 #include <vector>
 
-namespace platform::components {
+namespace screens {
 class DocumentListController;
 }
-namespace platform::ui {
+namespace kit {
 class AlertController;
 class Window;
-} // namespace platform::ui
+} // namespace kit
 
 namespace testing_support {
 
@@ -33,7 +33,7 @@ namespace testing_support {
 /// the storage offers and other apps are simulated, and the clock.
 class BrowserFixture : public testing::Test {
 protected:
-    using List = std::shared_ptr<platform::components::DocumentListController>;
+    using List = std::shared_ptr<screens::DocumentListController>;
 
     BrowserFixture();
     ~BrowserFixture() override;
@@ -56,7 +56,7 @@ protected:
     /// The last names of the folders that the stack shows, "*" for a quick preview,
     /// "i" for a details screen and "-" for another one.
     std::vector<std::string> stack() const;
-    std::shared_ptr<platform::ui::AlertController> alert() const;
+    std::shared_ptr<kit::AlertController> alert() const;
     /// The text of a number of items, as the catalogue has it.
     static std::string itemsText(std::size_t count);
 
@@ -66,7 +66,7 @@ protected:
     std::shared_ptr<SimulatedCloud> cloud;
     std::shared_ptr<SimulatedApps> apps = std::make_shared<SimulatedApps>();
     std::shared_ptr<SimulatedOffers> offers = std::make_shared<SimulatedOffers>();
-    std::shared_ptr<platform::ui::Window> window;
+    std::shared_ptr<kit::Window> window;
     std::shared_ptr<tarrow::NavController> browser;
 
 private:

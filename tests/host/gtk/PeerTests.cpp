@@ -12,15 +12,13 @@
 #include <gmock/gmock.h>
 
 namespace {
-
-namespace ui = platform::ui;
 using platform::Rect;
 using testing_support::makeScreen;
 
 class PeerTests : public testing_support::WindowFixture {
 protected:
     /// Shows a screen with this view at a frame.
-    std::shared_ptr<ui::View> showOne(const std::shared_ptr<ui::View>& view, const Rect& frame)
+    std::shared_ptr<kit::View> showOne(const std::shared_ptr<kit::View>& view, const Rect& frame)
     {
         const auto screen = makeScreen("");
         view->setFrame(frame);
@@ -32,17 +30,17 @@ protected:
 
 TEST_F(PeerTests, WidgetsStandWhereTheModelPutsThem)
 {
-    const auto label = std::make_shared<ui::Label>("Some words"),
-               second = std::make_shared<ui::Label>("More");
-    const auto button = std::make_shared<ui::Button>("Press");
-    const auto stack = std::make_shared<ui::StackView>(ui::Axis::Vertical);
-    for (const auto& view : std::vector<std::shared_ptr<ui::View>>{label, second, button})
+    const auto label = std::make_shared<kit::Label>("Some words"),
+               second = std::make_shared<kit::Label>("More");
+    const auto button = std::make_shared<kit::Button>("Press");
+    const auto stack = std::make_shared<kit::StackView>(kit::Axis::Vertical);
+    for (const auto& view : std::vector<std::shared_ptr<kit::View>>{label, second, button})
         stack->addArrangedSubview(view);
     stack->setSpacing(8);
     const auto root = showOne(stack, {20, 30, 300, 200});
     EXPECT_EQ(root->frame().size(), window->bounds().size());
 
-    for (const auto& view : std::vector<std::shared_ptr<ui::View>>{label, second, button}) {
+    for (const auto& view : std::vector<std::shared_ptr<kit::View>>{label, second, button}) {
         const auto shown = boundsIn(*view, *stack);
         EXPECT_NEAR(shown.x, view->frame().x, 1);
         EXPECT_NEAR(shown.y, view->frame().y, 1);
@@ -61,7 +59,7 @@ TEST_F(PeerTests, WidgetsStandWhereTheModelPutsThem)
 TEST_F(PeerTests, ATextThatFitsItsMeasureIsNotCut)
 {
     for (const char* text : {"iiiiiiii", "Wide Words", "مرحبا", "naïve – ☂"}) {
-        const auto label = std::make_shared<ui::Label>(text);
+        const auto label = std::make_shared<kit::Label>(text);
         label->sizeToFit();
         const auto screen = makeScreen("");
         screen->view()->addSubview(label);
@@ -74,7 +72,7 @@ TEST_F(PeerTests, ATextThatFitsItsMeasureIsNotCut)
 
 TEST_F(PeerTests, ChangesOfOneFrameAreShownTogether)
 {
-    const auto label = std::make_shared<ui::Label>("one");
+    const auto label = std::make_shared<kit::Label>("one");
     showOne(label, {0, 0, 100, 30});
     int notices = 0;
     g_signal_connect_swapped(
@@ -89,7 +87,7 @@ TEST_F(PeerTests, ChangesOfOneFrameAreShownTogether)
 TEST_F(PeerTests, APressReachesTheActionOnlyWhileTheButtonIsEnabled)
 {
     int presses = 0;
-    const auto button = std::make_shared<ui::Button>("Press", [&] { ++presses; });
+    const auto button = std::make_shared<kit::Button>("Press", [&] { ++presses; });
     showOne(button, {10, 10, 80, 20});
     g_signal_emit_by_name(nativeOf(*button), "clicked");
     EXPECT_EQ(presses, 1);
@@ -102,10 +100,10 @@ TEST_F(PeerTests, APressReachesTheActionOnlyWhileTheButtonIsEnabled)
 }
 
 /// Refuses digits.
-class NoDigits : public ui::TextFieldDelegate {
+class NoDigits : public kit::TextFieldDelegate {
 public:
     bool textFieldShouldChangeCharactersInRangeReplacementString(
-        ui::TextField&, const ui::TextRange&, const std::string& replacement) override
+        kit::TextField&, const kit::TextRange&, const std::string& replacement) override
     {
         return replacement.find_first_of("0123456789") == std::string::npos;
     }
@@ -113,7 +111,7 @@ public:
 
 TEST_F(PeerTests, AFieldFollowsTheEditsThatItsDelegateAllows)
 {
-    const auto field = std::make_shared<ui::TextField>("Report.pdf");
+    const auto field = std::make_shared<kit::TextField>("Report.pdf");
     const auto delegate = std::make_shared<NoDigits>();
     field->setDelegate(delegate);
     showOne(field, {10, 10, 300, 40});
@@ -133,7 +131,7 @@ TEST_F(PeerTests, AFieldFollowsTheEditsThatItsDelegateAllows)
 
 TEST_F(PeerTests, StandardColoursFollowTheTheme)
 {
-    showOne(std::make_shared<ui::View>(), {});
+    showOne(std::make_shared<kit::View>(), {});
     auto& theme = peer().context()->theme();
     auto* style = adw_style_manager_get_default();
     const auto brightness = [&](host::gtk::ColorUse use, const platform::Color& color) {
@@ -147,15 +145,15 @@ TEST_F(PeerTests, StandardColoursFollowTheTheme)
     EXPECT_LT(brightness(ColorUse::Background, platform::Color::white()), 0.3F);
     EXPECT_GT(brightness(ColorUse::Content, platform::Color::black()), 0.7F);
     EXPECT_GT(brightness(ColorUse::Content, platform::Color::white()), 0.9F);
-    EXPECT_EQ(window->traits().colorScheme, ui::ColorScheme::Dark);
+    EXPECT_EQ(window->traits().colorScheme, kit::ColorScheme::Dark);
     adw_style_manager_set_color_scheme(style, ADW_COLOR_SCHEME_FORCE_LIGHT);
 }
 
 TEST_F(PeerTests, NothingThatHasEndedIsCalled)
 {
     const auto screen = makeScreen("");
-    auto button = std::make_shared<ui::Button>("Gone");
-    auto label = std::make_shared<ui::Label>("Stays");
+    auto button = std::make_shared<kit::Button>("Gone");
+    auto label = std::make_shared<kit::Label>("Stays");
     screen->view()->addSubview(button);
     screen->view()->addSubview(label);
     show(screen);

@@ -17,9 +17,9 @@
 namespace {
 
 using host::gtk::PreviewModule;
-using platform::components::PreviewMediaView;
-using platform::components::PreviewTextView;
-using platform::components::PreviewView;
+using screens::PreviewMediaView;
+using screens::PreviewTextView;
+using screens::PreviewView;
 
 struct BadModule {
     const char* name;
@@ -46,7 +46,7 @@ protected:
         previews = PreviewModule::inFile(folder.at("previews.so"));
         host = std::make_shared<host::gtk::GtkWindowHost>(
             nullptr, host::gtk::WindowSize{400, 700, false}, previews);
-        platform::ui::WindowHost::install(host);
+        kit::WindowHost::install(host);
     }
     std::string wordsOf(const std::shared_ptr<PreviewView>& view)
     {

@@ -21,9 +21,7 @@
 #include <adwaita.h>
 
 namespace {
-
-namespace ui = platform::ui;
-using namespace platform::components;
+using namespace screens;
 using platform::Image;
 using platform::Picture;
 using testing_support::makeScreen;
@@ -69,7 +67,7 @@ protected:
     }
 
     std::shared_ptr<platform::Dispatch> dispatch = std::make_shared<host::system::GLibDispatch>();
-    std::shared_ptr<ui::ViewController> screen = makeScreen("Preview");
+    std::shared_ptr<kit::ViewController> screen = makeScreen("Preview");
     testing_support::TemporaryDirectory folder;
 };
 

@@ -15,8 +15,6 @@
 #include <numeric>
 
 namespace {
-
-namespace ui = platform::ui;
 using ::testing::ElementsAre;
 using testing_support::makeScreen;
 
@@ -45,14 +43,14 @@ TEST_F(NavigationTests, TheShownPageIsTheTopScreen)
         EXPECT_EQ(shownTitle(), "Second");
         EXPECT_EQ(visible(), navigationPeer().topPage()->widget());
         EXPECT_TRUE(gtk_widget_get_visible(backButton()));
-        EXPECT_EQ(second->appearanceState(), ui::AppearanceState::Appeared);
+        EXPECT_EQ(second->appearanceState(), kit::AppearanceState::Appeared);
 
         g_signal_emit_by_name(backButton(), "clicked");
         waitFor([&] { return !stack->isTransitioning(); }, "the pop");
         settle();
         EXPECT_EQ(stack->topViewController(), first);
         EXPECT_EQ(visible(), navigationPeer().topPage()->widget());
-        EXPECT_EQ(second->appearanceState(), ui::AppearanceState::Disappeared);
+        EXPECT_EQ(second->appearanceState(), kit::AppearanceState::Disappeared);
     }
     stack->setViewControllers({third, second, first}, true);
     settle();
@@ -77,11 +75,11 @@ TEST_F(NavigationTests, BarsFollowTheScreen)
 {
     const auto screen = makeScreen("One");
     int presses = 0;
-    const auto item = std::make_shared<ui::BarButtonItem>("Select", [&](const auto&) { ++presses; });
+    const auto item = std::make_shared<kit::BarButtonItem>("Select", [&](const auto&) { ++presses; });
     const auto stack = showStack({screen});
     screen->navigationItem().setRightItem(item);
-    screen->setToolbarItems({std::make_shared<ui::BarButtonItem>(ui::SystemItem::FlexibleSpace),
-        std::make_shared<ui::BarButtonItem>("Move", [&](const auto&) { presses += 10; })});
+    screen->setToolbarItems({std::make_shared<kit::BarButtonItem>(kit::SystemItem::FlexibleSpace),
+        std::make_shared<kit::BarButtonItem>("Move", [&](const auto&) { presses += 10; })});
     stack->setToolbarHidden(false);
     settle();
     ASSERT_TRUE(findButton("Select") && findButton("Move"));
@@ -99,25 +97,25 @@ TEST_F(NavigationTests, BarsFollowTheScreen)
 
 class AlertTests : public testing_support::WindowFixture {
 protected:
-    void present(const std::shared_ptr<ui::AlertController>& alert)
+    void present(const std::shared_ptr<kit::AlertController>& alert)
     {
         root = makeScreen("Root");
         show(root);
         root->presentViewController(alert, true);
         settle();
     }
-    std::shared_ptr<ui::ViewController> root;
+    std::shared_ptr<kit::ViewController> root;
 };
 
 TEST_F(AlertTests, AnAlertMayRefuseToClose)
 {
     const auto alert =
-        std::make_shared<ui::AlertController>("New Folder", "Enter a name.", ui::AlertStyle::Alert);
-    alert->addTextField([](ui::TextField& field) { field.setPlaceholder("Name"); });
-    const auto create = std::make_shared<ui::AlertAction>("Create", ui::AlertActionStyle::Default);
+        std::make_shared<kit::AlertController>("New Folder", "Enter a name.", kit::AlertStyle::Alert);
+    alert->addTextField([](kit::TextField& field) { field.setPlaceholder("Name"); });
+    const auto create = std::make_shared<kit::AlertAction>("Create", kit::AlertActionStyle::Default);
     bool mayClose = false;
     create->setShouldClose([&] { return mayClose; });
-    alert->addAction(std::make_shared<ui::AlertAction>("Cancel", ui::AlertActionStyle::Cancel));
+    alert->addAction(std::make_shared<kit::AlertAction>("Cancel", kit::AlertActionStyle::Cancel));
     alert->addAction(create);
     present(alert);
 
@@ -149,12 +147,12 @@ TEST_F(AlertTests, AnAlertMayRefuseToClose)
 TEST_F(AlertTests, EscapeCancelsAndAnimationsEnd)
 {
     g_object_set(gtk_settings_get_default(), "gtk-enable-animations", TRUE, nullptr);
-    for (const auto style : {ui::AlertStyle::Alert, ui::AlertStyle::ActionSheet}) {
+    for (const auto style : {kit::AlertStyle::Alert, kit::AlertStyle::ActionSheet}) {
         int cancelled = 0;
-        const auto alert = std::make_shared<ui::AlertController>("Delete?", "", style);
-        alert->addAction(std::make_shared<ui::AlertAction>("Delete", ui::AlertActionStyle::Destructive));
-        alert->addAction(std::make_shared<ui::AlertAction>(
-            "Cancel", ui::AlertActionStyle::Cancel, [&](const auto&) { ++cancelled; }));
+        const auto alert = std::make_shared<kit::AlertController>("Delete?", "", style);
+        alert->addAction(std::make_shared<kit::AlertAction>("Delete", kit::AlertActionStyle::Destructive));
+        alert->addAction(std::make_shared<kit::AlertAction>(
+            "Cancel", kit::AlertActionStyle::Cancel, [&](const auto&) { ++cancelled; }));
         present(alert);
         EXPECT_TRUE(window->backRequested());
         waitFor([&] { return cancelled == 1; }, "the cancel action");
@@ -166,7 +164,7 @@ TEST_F(AlertTests, EscapeCancelsAndAnimationsEnd)
 TEST_F(AlertTests, TheKeyboardGoesThroughAnAlertAndBack)
 {
     root = makeScreen("Root");
-    const auto below = std::make_shared<ui::TextField>("below");
+    const auto below = std::make_shared<kit::TextField>("below");
     below->setFrame({20, 20, 200, 50});
     root->view()->addSubview(below);
     show(root);
@@ -177,11 +175,11 @@ TEST_F(AlertTests, TheKeyboardGoesThroughAnAlertAndBack)
     ASSERT_NE(before, nullptr);
 
     const auto alert =
-        std::make_shared<ui::AlertController>("Rename", "Enter a name.", ui::AlertStyle::Alert);
-    alert->addTextField([](ui::TextField& field) { field.setText("Plans"); });
-    const auto cancel = std::make_shared<ui::AlertAction>("Cancel", ui::AlertActionStyle::Default);
+        std::make_shared<kit::AlertController>("Rename", "Enter a name.", kit::AlertStyle::Alert);
+    alert->addTextField([](kit::TextField& field) { field.setText("Plans"); });
+    const auto cancel = std::make_shared<kit::AlertAction>("Cancel", kit::AlertActionStyle::Default);
     alert->addAction(cancel);
-    alert->addAction(std::make_shared<ui::AlertAction>("Done", ui::AlertActionStyle::Default));
+    alert->addAction(std::make_shared<kit::AlertAction>("Done", kit::AlertActionStyle::Default));
     alert->setEscapeAction(cancel);
     root->presentViewController(alert, true);
     settle();
@@ -198,10 +196,10 @@ TEST_F(AlertTests, TheKeyboardGoesThroughAnAlertAndBack)
 
 TEST_F(AlertTests, AnAlertIsAsHighAsItsBrokenLines)
 {
-    const auto alert = std::make_shared<ui::AlertController>(
-        "Objekt umbenennen", "Gib einen neuen Namen für dieses Objekt ein.", ui::AlertStyle::Alert);
+    const auto alert = std::make_shared<kit::AlertController>(
+        "Objekt umbenennen", "Gib einen neuen Namen für dieses Objekt ein.", kit::AlertStyle::Alert);
     alert->addTextField({});
-    alert->addAction(std::make_shared<ui::AlertAction>("Fertig", ui::AlertActionStyle::Default));
+    alert->addAction(std::make_shared<kit::AlertAction>("Fertig", kit::AlertActionStyle::Default));
     present(alert);
     auto* field = peerOf(*alert->textFields().front())->widget();
     auto* scrolled = gtk_widget_get_ancestor(field, GTK_TYPE_SCROLLED_WINDOW);
@@ -210,33 +208,33 @@ TEST_F(AlertTests, AnAlertIsAsHighAsItsBrokenLines)
         << "nothing is hidden where the window has the room";
 }
 
-class Numbers : public ui::ListViewDataSource, public ui::ListViewDelegate {
+class Numbers : public kit::ListViewDataSource, public kit::ListViewDelegate {
 public:
-    std::size_t numberOfRows(const ui::ListView&) const override { return ids.size(); }
-    ui::ListRow rowAtIndex(const ui::ListView&, std::size_t index) const override
+    std::size_t numberOfRows(const kit::ListView&) const override { return ids.size(); }
+    kit::ListRow rowAtIndex(const kit::ListView&, std::size_t index) const override
     {
-        ui::ListRow row;
+        kit::ListRow row;
         row.id = ids[index];
         row.title = titles.count(row.id) ? titles.at(row.id) : "Row " + std::to_string(row.id);
         return row;
     }
-    ui::RowId rowIdAtIndex(const ui::ListView&, std::size_t index) const override { return ids[index]; }
-    void rowActivated(ui::ListView&, std::size_t index) override { activated.push_back(ids[index]); }
-    bool rowHeld(ui::ListView&, std::size_t index) override
+    kit::RowId rowIdAtIndex(const kit::ListView&, std::size_t index) const override { return ids[index]; }
+    void rowActivated(kit::ListView&, std::size_t index) override { activated.push_back(ids[index]); }
+    bool rowHeld(kit::ListView&, std::size_t index) override
     {
         held.push_back(ids[index]);
         return true;
     }
-    ui::Menu menuForRow(ui::ListView&, std::size_t index) override
+    kit::Menu menuForRow(kit::ListView&, std::size_t index) override
     {
         menus.push_back(ids[index]);
         return {};
     }
 
-    std::vector<ui::RowId> held, menus;
-    std::vector<ui::RowId> ids;
-    std::map<ui::RowId, std::string> titles;
-    std::vector<ui::RowId> activated;
+    std::vector<kit::RowId> held, menus;
+    std::vector<kit::RowId> ids;
+    std::map<kit::RowId, std::string> titles;
+    std::vector<kit::RowId> activated;
 };
 
 class ListTests : public testing_support::WindowFixture {
@@ -279,16 +277,16 @@ protected:
         waitFor(
             [&] { return std::ranges::all_of(listPeer().liveRows(), match); }, "the rows beside the seen");
     }
-    void change(std::vector<ui::RowId> after)
+    void change(std::vector<kit::RowId> after)
     {
-        const auto changes = ui::ListChanges::between(rows->ids, after);
+        const auto changes = kit::ListChanges::between(rows->ids, after);
         rows->ids = std::move(after);
         list->apply(changes);
         settle();
     }
 
     std::shared_ptr<Numbers> rows = std::make_shared<Numbers>();
-    std::shared_ptr<ui::ListView> list = std::make_shared<ui::ListView>();
+    std::shared_ptr<kit::ListView> list = std::make_shared<kit::ListView>();
 };
 
 TEST_F(ListTests, RowWidgetsMatchTheModelThroughEveryChange)
@@ -319,7 +317,7 @@ TEST_F(ListTests, ATapOpensAndInSelectionModeMarks)
     };
     activate(2);
     EXPECT_THAT(rows->activated, ElementsAre(3U));
-    list->setSelectionMode(ui::SelectionMode::Multiple);
+    list->setSelectionMode(kit::SelectionMode::Multiple);
     settle();
     activate(1);
     activate(3);
@@ -332,7 +330,7 @@ TEST_F(ListTests, ATapOpensAndInSelectionModeMarks)
 TEST_F(ListTests, ManyChangesElsewhereKeepThePlaceAndTheFocus)
 {
     showRows(5000);
-    list->scrollToRow(2500, ui::RowPosition::Top, false);
+    list->scrollToRow(2500, kit::RowPosition::Top, false);
     settle();
     EXPECT_EQ(list->visibleRows().first, 2500U);
     list->focusRow(2503);
@@ -344,8 +342,8 @@ TEST_F(ListTests, ManyChangesElsewhereKeepThePlaceAndTheFocus)
     };
     waitFor([&] { return focusedId() == 2504; }, "the focus to come to the row");
     EXPECT_EQ(list->visibleRows().first, 2500U);
-    std::vector<ui::RowId> after;
-    for (ui::RowId id = 1; id <= 5000; ++id) {
+    std::vector<kit::RowId> after;
+    for (kit::RowId id = 1; id <= 5000; ++id) {
         after.push_back(id);
         const bool isNear = id > 2490 && id < 2520;
         if (id % 2 == 0 && !isNear)
@@ -381,7 +379,7 @@ TEST_F(ListTests, AHundredThousandRowsCostWhatIsNearTheVisibleOnes)
 {
     showRows(100'000);
     EXPECT_LT(listPeer().liveRows().size(), 400U);
-    list->scrollToRow(70'000, ui::RowPosition::Top, false);
+    list->scrollToRow(70'000, kit::RowPosition::Top, false);
     settle();
     EXPECT_EQ(list->visibleRows().first, 70'000U);
     expectRowsMatch();

@@ -13,8 +13,6 @@
 
 namespace testing_support {
 
-namespace ui = platform::ui;
-
 namespace {
 
 GtkWidget* find(GtkWidget* widget, const std::function<bool(GtkWidget*)>& matches)
@@ -45,20 +43,20 @@ std::shared_ptr<host::gtk::PreviewModule> linkedPreviews()
 WindowFixture::WindowFixture()
     : host(std::make_shared<host::gtk::GtkWindowHost>(
         nullptr, host::gtk::WindowSize{400, 700, false}, linkedPreviews()))
-    , window(std::make_shared<ui::Window>())
+    , window(std::make_shared<kit::Window>())
 {
     platform::ServiceSet set;
     set.localization = std::make_shared<PlainTexts>();
     set.notificationCenter = std::make_shared<platform::NotificationCenter>();
     platform::installServices(std::move(set));
-    ui::WindowHost::install(host);
+    kit::WindowHost::install(host);
     g_object_set(gtk_settings_get_default(), "gtk-enable-animations", FALSE, nullptr);
 }
 
 WindowFixture::~WindowFixture()
 {
     closeWindow();
-    ui::WindowHost::install(nullptr);
+    kit::WindowHost::install(nullptr);
     platform::installServices({});
 }
 
@@ -77,7 +75,7 @@ void WindowFixture::closeWindow()
     while (g_main_context_iteration(nullptr, FALSE)) { }
 }
 
-void WindowFixture::show(const std::shared_ptr<ui::ViewController>& root)
+void WindowFixture::show(const std::shared_ptr<kit::ViewController>& root)
 {
     window->setRootViewController(root);
     window->makeKeyAndVisible();
@@ -86,10 +84,10 @@ void WindowFixture::show(const std::shared_ptr<ui::ViewController>& root)
     settle();
 }
 
-std::shared_ptr<ui::NavigationController> WindowFixture::showStack(
-    std::vector<std::shared_ptr<ui::ViewController>> screens)
+std::shared_ptr<kit::NavigationController> WindowFixture::showStack(
+    std::vector<std::shared_ptr<kit::ViewController>> screens)
 {
-    auto stack = std::make_shared<ui::NavigationController>();
+    auto stack = std::make_shared<kit::NavigationController>();
     stack->setViewControllers(std::move(screens), false);
     show(stack);
     return stack;
@@ -124,12 +122,12 @@ void WindowFixture::settle()
     }
 }
 
-host::gtk::ViewPeer* WindowFixture::peerOf(const ui::View& view) const
+host::gtk::ViewPeer* WindowFixture::peerOf(const kit::View& view) const
 {
     return peer().context()->peerOf(view);
 }
 
-platform::Rect WindowFixture::boundsIn(const ui::View& view, const ui::View& ancestor) const
+platform::Rect WindowFixture::boundsIn(const kit::View& view, const kit::View& ancestor) const
 {
     graphene_rect_t bounds;
     if (!gtk_widget_compute_bounds(peerOf(view)->widget(), peerOf(ancestor)->widget(), &bounds))
@@ -147,9 +145,9 @@ GtkWidget* WindowFixture::findButton(const std::string& text) const
     });
 }
 
-std::shared_ptr<ui::ViewController> makeScreen(const std::string& title)
+std::shared_ptr<kit::ViewController> makeScreen(const std::string& title)
 {
-    auto screen = std::make_shared<ui::ViewController>();
+    auto screen = std::make_shared<kit::ViewController>();
     screen->setTitle(title);
     return screen;
 }

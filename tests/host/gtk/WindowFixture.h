@@ -30,10 +30,10 @@ protected:
     void TearDown() override;
 
     /// Shows a screen as the root, and waits until it has its size.
-    void show(const std::shared_ptr<platform::ui::ViewController>& root);
+    void show(const std::shared_ptr<kit::ViewController>& root);
     /// The stack around these screens, shown.
-    std::shared_ptr<platform::ui::NavigationController> showStack(
-        std::vector<std::shared_ptr<platform::ui::ViewController>> screens);
+    std::shared_ptr<kit::NavigationController> showStack(
+        std::vector<std::shared_ptr<kit::ViewController>> screens);
     /// Runs the main loop until a condition holds; a test fails after five seconds.
     void waitFor(const std::function<bool()>& condition, const char* what);
     /// Runs the main loop until everything that was scheduled is shown and laid out.
@@ -43,18 +43,18 @@ protected:
 
     host::gtk::WindowPeer& peer() const { return *host->windowPeer(); }
     GtkWidget* windowWidget() const { return GTK_WIDGET(peer().window()); }
-    host::gtk::ViewPeer* peerOf(const platform::ui::View& view) const;
-    GtkWidget* nativeOf(const platform::ui::View& view) const { return peerOf(view)->native(); }
+    host::gtk::ViewPeer* peerOf(const kit::View& view) const;
+    GtkWidget* nativeOf(const kit::View& view) const { return peerOf(view)->native(); }
     /// Where a widget stands in the widget of another view's peer.
-    platform::Rect boundsIn(const platform::ui::View& view, const platform::ui::View& ancestor) const;
+    platform::Rect boundsIn(const kit::View& view, const kit::View& ancestor) const;
     /// The first widget below the window with this type and this text on its label; null: none.
     GtkWidget* findButton(const std::string& text) const;
 
     std::shared_ptr<host::gtk::GtkWindowHost> host;
-    std::shared_ptr<platform::ui::Window> window;
+    std::shared_ptr<kit::Window> window;
 };
 
 /// A screen whose view a test fills.
-std::shared_ptr<platform::ui::ViewController> makeScreen(const std::string& title);
+std::shared_ptr<kit::ViewController> makeScreen(const std::string& title);
 
 } // namespace testing_support

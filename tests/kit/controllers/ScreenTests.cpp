@@ -13,7 +13,7 @@
 
 #include <gtest/gtest.h>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -436,4 +436,4 @@ TEST_F(Screens, KeepTheirStateByIdentifier)
     EXPECT_EQ(nameless->value, 0);
 }
 
-} // namespace platform::ui
+} // namespace kit

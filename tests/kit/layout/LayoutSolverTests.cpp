@@ -9,7 +9,7 @@
 #include <map>
 #include <random>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -172,4 +172,4 @@ TEST(LayoutSolver, IncrementalWorkEndsWhereAFreshStartEnds)
     }
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -27,7 +27,7 @@ void PrintTo(const Rect& rect, std::ostream* out)
 
 } // namespace platform
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -410,4 +410,4 @@ TEST(VisualFormat, ReadsEveryForm)
     EXPECT_EQ(texts, expected);
 }
 
-} // namespace platform::ui
+} // namespace kit

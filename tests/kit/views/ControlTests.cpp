@@ -13,7 +13,7 @@
 
 #include <ostream>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -235,4 +235,4 @@ TEST(KeyboardNotice, SurvivesTheTrip)
     EXPECT_EQ(KeyboardNotice::fromUserInfo({{"height", 250}}).beginFrame.height, 250);
 }
 
-} // namespace platform::ui
+} // namespace kit

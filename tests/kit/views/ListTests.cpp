@@ -11,7 +11,7 @@
 #include <ostream>
 #include <random>
 
-namespace platform::ui {
+namespace kit {
 
 namespace {
 
@@ -294,4 +294,4 @@ TEST(Difference, HoldsForAnyTwoOrders)
     }
 }
 
-} // namespace platform::ui
+} // namespace kit

@@ -13,7 +13,7 @@
 #include <map>
 
 using namespace platform;
-using namespace platform::components;
+using namespace screens;
 using testing::ElementsAre;
 using testing_support::DocumentList;
 using testing_support::HandLister;
@@ -66,15 +66,15 @@ TEST_F(DocumentList, AnswersTheKeysOfItsRows)
     delegate->take();
     const struct {
         std::size_t row;
-        ui::RowCommand command;
+        kit::RowCommand command;
         Lines told;
     } rows[] = {
-        {1, ui::RowCommand::Rename, {"action 3 Notes.txt"}},
-        {1, ui::RowCommand::Info, {"action 2 Notes.txt"}},
-        {1, ui::RowCommand::Delete, {}}, // not enabled
-        {1, ui::RowCommand::Peek, {}}, // nothing to show
-        {0, ui::RowCommand::Rename, {}}, // not for a library
-        {7, ui::RowCommand::Info, {}},
+        {1, kit::RowCommand::Rename, {"action 3 Notes.txt"}},
+        {1, kit::RowCommand::Info, {"action 2 Notes.txt"}},
+        {1, kit::RowCommand::Delete, {}}, // not enabled
+        {1, kit::RowCommand::Peek, {}}, // nothing to show
+        {0, kit::RowCommand::Rename, {}}, // not for a library
+        {7, kit::RowCommand::Info, {}},
     };
     for (const auto& row : rows) {
         EXPECT_EQ(list->listView()->commandRow(row.row, row.command), !row.told.empty());
@@ -88,11 +88,11 @@ TEST_F(DocumentList, AHeldRowShowsItsScreenWithWhatCanBeDoneWithIt)
     deliver(list, {{"a.txt"}, {"b.txt"}});
     list->setAvailableActions(125);
     delegate->take();
-    delegate->preview = std::make_shared<ui::ViewController>();
+    delegate->preview = std::make_shared<kit::ViewController>();
     const auto peek = [&] {
-        EXPECT_TRUE(list->listView()->commandRow(1, ui::RowCommand::Peek));
+        EXPECT_TRUE(list->listView()->commandRow(1, kit::RowCommand::Peek));
         drive.dispatch->runUntilIdle();
-        return std::dynamic_pointer_cast<ui::AlertController>(list->presentedViewController());
+        return std::dynamic_pointer_cast<kit::AlertController>(list->presentedViewController());
     };
     auto shown = peek();
     ASSERT_TRUE(shown);
@@ -187,9 +187,9 @@ TEST_F(DocumentList, SelectsWhileEditingAndKeepsTheSelectionThroughChanges)
     list->listView()->setListObserver(observer);
     deliver(list, {{"0"}, {"a"}, {"b"}, {"d"}});
     EXPECT_EQ(list->selectedItems(), (std::vector{drive.url("Stuff/b"), drive.url("Stuff/d")}));
-    EXPECT_EQ(observer->last.splices, (std::vector<ui::ListSplice>{{0, 0, 1}, {3, 1, 0}}));
+    EXPECT_EQ(observer->last.splices, (std::vector<kit::ListSplice>{{0, 0, 1}, {3, 1, 0}}));
     EXPECT_EQ(observer->resets, 0);
-    EXPECT_EQ(list->listView()->row(2).check, ui::CheckState::On);
+    EXPECT_EQ(list->listView()->row(2).check, kit::CheckState::On);
 
     deliver(list, {{"a"}, {"b"}});
     EXPECT_EQ(list->selectedItems(), std::vector{drive.url("Stuff/b")});
@@ -207,10 +207,10 @@ TEST_F(DocumentList, SearchesTheWholeDriveAndSaysWhereItemsLie)
     const auto list = shownList(drive.url("Stuff"));
     list->startSearchWithQueryStringBecomeFirstResponder("TRIP", true);
     drive.dispatch->runUntilIdle();
-    const auto search = std::dynamic_pointer_cast<ui::SearchPresentation>(list->presentedViewController());
+    const auto search = std::dynamic_pointer_cast<kit::SearchPresentation>(list->presentedViewController());
     ASSERT_TRUE(search);
     EXPECT_TRUE(search->hasFocus());
-    const auto results = std::dynamic_pointer_cast<ui::ListView>(search->view()->subviews().front());
+    const auto results = std::dynamic_pointer_cast<kit::ListView>(search->view()->subviews().front());
     ASSERT_TRUE(results);
     results->setFrame({0, 0, 360, 600});
     results->layoutIfNeeded();

@@ -14,7 +14,7 @@
 #include <fstream>
 
 using namespace platform;
-using namespace platform::components;
+using namespace screens;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing_support::DocumentList;
@@ -30,8 +30,8 @@ using Kind = FolderEntryKind;
 struct RowOfKind {
     HandLister::Entry entry;
     std::string detail; ///< the end of the second line
-    ui::DownloadState download = ui::DownloadState::Present;
-    ui::RowAccessory accessory = ui::RowAccessory::None;
+    kit::DownloadState download = kit::DownloadState::Present;
+    kit::RowAccessory accessory = kit::RowAccessory::None;
     std::size_t dots = 0;
 };
 
@@ -50,10 +50,10 @@ TEST_F(DocumentList, ShowsEveryKindOfItemWithItsDetails)
     drive.makeFolder("Stuff/Letter.pages");
     drive.writeDocument("Stuff/bad\xFF\u202Egpj.exe");
     const RowOfKind rows[] = {
-        {{"Trip", Kind::Folder}, localizedPlural(".DICT.ITEMS.%d", {2}), ui::DownloadState::Present,
-            ui::RowAccessory::Disclosure},
+        {{"Trip", Kind::Folder}, localizedPlural(".DICT.ITEMS.%d", {2}), kit::DownloadState::Present,
+            kit::RowAccessory::Disclosure},
         {{"bad\xFF\u202Egpj.exe"}, "7 bytes"},
-        {{"Far.pdf", Kind::Document, true}, "2 MB", ui::DownloadState::InCloud, ui::RowAccessory::None, 2},
+        {{"Far.pdf", Kind::Document, true}, "2 MB", kit::DownloadState::InCloud, kit::RowAccessory::None, 2},
         {{"Letter.pages", Kind::Package}, ""},
         {{"Notes.txt"}, "2 KB"},
         {{"Ours.txt"}, "3 bytes · Shared"},
@@ -214,14 +214,14 @@ TEST_F(DocumentList, DownloadsADocumentAndShowsHowFarItIs)
     };
     EXPECT_TRUE(list->listView()->menuForRow(1).empty());
     choose("Download");
-    EXPECT_EQ(row().download, ui::DownloadState::Downloading);
+    EXPECT_EQ(row().download, kit::DownloadState::Downloading);
     EXPECT_THAT(row().accessibleDescription, HasSubstr("Downloading"));
     choose("Cancel Download");
     drive.dispatch->runUntilIdle();
-    EXPECT_EQ(row().download, ui::DownloadState::InCloud);
+    EXPECT_EQ(row().download, kit::DownloadState::InCloud);
 
     struct Shares : RecordingListObserver {
-        void rowDidChange(ui::ListView& view, std::size_t index) override
+        void rowDidChange(kit::ListView& view, std::size_t index) override
         {
             shares.push_back(view.row(index).downloadProgress);
         }
@@ -239,7 +239,7 @@ TEST_F(DocumentList, DownloadsADocumentAndShowsHowFarItIs)
     drive.writePromise("Stuff/far.txt", far);
     choose("Download");
     drive.dispatch->runUntilIdle();
-    EXPECT_TRUE(std::dynamic_pointer_cast<ui::AlertController>(list->presentedViewController()));
+    EXPECT_TRUE(std::dynamic_pointer_cast<kit::AlertController>(list->presentedViewController()));
 }
 
 } // namespace

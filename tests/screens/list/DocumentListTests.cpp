@@ -13,7 +13,7 @@
 #include <filesystem>
 
 using namespace platform;
-using namespace platform::components;
+using namespace screens;
 using testing::HasSubstr;
 using testing_support::DocumentList;
 using testing_support::HandLister;
@@ -144,7 +144,7 @@ TEST_F(DocumentList, OffersTheOrdersInAMenu)
     const auto marked = [&] {
         Lines titles;
         for (const auto& entry : list->navigationItem().menu()())
-            if (entry.mark == ui::MenuMark::On)
+            if (entry.mark == kit::MenuMark::On)
                 titles.push_back(entry.title);
         return titles;
     };

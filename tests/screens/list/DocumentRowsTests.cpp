@@ -9,7 +9,7 @@
 #include <set>
 
 using namespace platform;
-using namespace platform::components;
+using namespace screens;
 
 namespace {
 
@@ -30,7 +30,7 @@ TEST(DocumentRows, TellsWhatChangedBetweenTwoStates)
     const auto after = DocumentRows::make(snapshot({"a", "b", "bb", "d", "e"}, {"e"}));
     const auto changes = DocumentRows::changes(*before, *after);
 
-    std::vector<ui::RowId> replayed(before->ids().begin(), before->ids().end());
+    std::vector<kit::RowId> replayed(before->ids().begin(), before->ids().end());
     auto inserted = after->ids().begin();
     for (const auto& splice : changes.splices) {
         const auto at = replayed.erase(replayed.begin() + static_cast<std::ptrdiff_t>(splice.position),
@@ -40,7 +40,7 @@ TEST(DocumentRows, TellsWhatChangedBetweenTwoStates)
     }
     EXPECT_TRUE(std::ranges::equal(replayed, after->ids()));
     // "b" is here now; "e" came, which is no change of a row.
-    EXPECT_EQ(changes.changed, (std::vector<ui::RowRange>{{1, 1}}));
+    EXPECT_EQ(changes.changed, (std::vector<kit::RowRange>{{1, 1}}));
 }
 
 TEST(DocumentRows, GivesEveryRowAnIdentifierOfItsOwn)
@@ -53,7 +53,7 @@ TEST(DocumentRows, GivesEveryRowAnIdentifierOfItsOwn)
     builder.append("text", FolderEntryKind::Document, true);
     const auto rows = DocumentRows::make(builder.finish(ListingStage::Complete));
 
-    EXPECT_EQ(std::set<ui::RowId>(rows->ids().begin(), rows->ids().end()).size(), 4U);
+    EXPECT_EQ(std::set<kit::RowId>(rows->ids().begin(), rows->ids().end()).size(), 4U);
     EXPECT_EQ(rows->idFor(library), rows->ids()[0]);
     EXPECT_EQ(rows->idFor(Url::fileURL("/drive/Notes")), rows->ids()[1]);
 }

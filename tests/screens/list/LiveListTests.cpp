@@ -14,7 +14,7 @@
 #include <random>
 
 using namespace platform;
-using namespace platform::components;
+using namespace screens;
 
 namespace {
 
@@ -48,7 +48,7 @@ protected:
     /// A list, and what its changes made of the rows that a view would have.
     struct Followed {
         std::shared_ptr<FolderContents> contents;
-        std::vector<ui::RowId> ids;
+        std::vector<kit::RowId> ids;
         Lines lines;
         std::size_t wholeLists = 0, revisions = 0;
     };
@@ -67,7 +67,7 @@ protected:
         const auto after = linesOf(*update.rows);
         const auto& ids = update.rows->ids();
         (update.rows->snapshot()->revision() ? followed.revisions : followed.wholeLists) += 1;
-        const auto splice = [](auto& values, const ui::ListSplice& change, const auto& news) {
+        const auto splice = [](auto& values, const kit::ListSplice& change, const auto& news) {
             const auto at = static_cast<std::ptrdiff_t>(change.position);
             const auto place = values.erase(
                 values.begin() + at, values.begin() + at + static_cast<std::ptrdiff_t>(change.removed));

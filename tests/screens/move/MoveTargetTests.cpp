@@ -15,7 +15,7 @@
 #include <gmock/gmock.h>
 
 using namespace platform;
-using namespace platform::components;
+using namespace screens;
 using testing::ElementsAre;
 using testing::IsEmpty;
 using testing_support::ComponentsFixture;
@@ -77,12 +77,12 @@ protected:
         lister->deliver(screen.folder(), entries);
         drive.dispatch->runUntilIdle();
     }
-    static std::shared_ptr<ui::BarButtonItem> moveButton(const MoveTargetScreen& screen)
+    static std::shared_ptr<kit::BarButtonItem> moveButton(const MoveTargetScreen& screen)
     {
         return screen.toolbarItems().back();
     }
 
-    std::shared_ptr<ui::ViewController> base = std::make_shared<ui::ViewController>();
+    std::shared_ptr<kit::ViewController> base = std::make_shared<kit::ViewController>();
     std::shared_ptr<RecordingPickerDelegate> told = std::make_shared<RecordingPickerDelegate>();
 };
 
@@ -173,7 +173,7 @@ TEST_F(MoveTarget, MakesAFolderAndEntersItOrSaysWhyNot)
     const auto screen = load(*picker);
     const auto ask = [&](const std::string& name) {
         screen->askForNewFolder();
-        const auto alert = std::static_pointer_cast<ui::AlertController>(picker->presentedViewController());
+        const auto alert = std::static_pointer_cast<kit::AlertController>(picker->presentedViewController());
         alert->textFields().front()->userEdited(name, {});
         const bool pressed = alert->press(1);
         if (!pressed)
@@ -185,7 +185,7 @@ TEST_F(MoveTarget, MakesAFolderAndEntersItOrSaysWhyNot)
         EXPECT_FALSE(ask(refused)) << refused;
     drive.writeDocument("Taken");
     EXPECT_TRUE(ask("Taken"));
-    const auto failure = std::static_pointer_cast<ui::AlertController>(picker->presentedViewController());
+    const auto failure = std::static_pointer_cast<kit::AlertController>(picker->presentedViewController());
     ASSERT_TRUE(failure);
     EXPECT_FALSE(failure->message().empty());
     failure->press(std::size_t{0});

@@ -12,7 +12,7 @@
 #include <set>
 
 using namespace platform;
-using namespace platform::components;
+using namespace screens;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing_support::ComponentsFixture;

@@ -27,7 +27,7 @@
 #include <fstream>
 
 using namespace platform;
-using namespace platform::components;
+using namespace screens;
 using testing::HasSubstr;
 using testing_support::ComponentsFixture;
 using Kind = PreviewContent::Kind;
@@ -162,7 +162,7 @@ TEST_F(Preview, CutsLongTextsAndSaysSo)
 
 TEST_F(Preview, ReadsNoMorePixelsThanAreSeen)
 {
-    ui::Screen::setMain(ui::Screen{{0, 0, 10, 5}, 2, ui::UserInterfaceIdiom::Phone, {}});
+    kit::Screen::setMain(kit::Screen{{0, 0, 10, 5}, 2, kit::UserInterfaceIdiom::Phone, {}});
     std::string picture = "P6 100 100 255\n";
     picture.append(30'000, 'z');
     show({drive.writeDocument("Large.png", picture)});
@@ -174,7 +174,7 @@ TEST_F(Preview, ReadsNoMorePixelsThanAreSeen)
     view->userSeesPixels(11);
     view->userSeesPixels(50);
     drive.dispatch->runUntilIdle();
-    ui::Screen::setMain(std::nullopt);
+    kit::Screen::setMain(std::nullopt);
     EXPECT_EQ(screen->previewView(), view);
     EXPECT_EQ(view->picture().frames.front().image.pixelHeight(), 100);
 }
@@ -216,7 +216,7 @@ std::vector<std::string> offers(const PreviewController& screen)
 {
     std::vector<std::string> titles;
     const auto view = std::dynamic_pointer_cast<PreviewSummaryView>(screen.screenView()->content());
-    for (const auto& button : view ? view->buttons() : std::vector<std::shared_ptr<ui::Button>>())
+    for (const auto& button : view ? view->buttons() : std::vector<std::shared_ptr<kit::Button>>())
         titles.push_back(button->title());
     return titles;
 }
@@ -319,14 +319,14 @@ TEST_F(Download, EndsWhenThePersonGoesBack)
     putContent();
     show({*far});
     drive.dispatch->runUntilIdle();
-    const auto stack = std::make_shared<ui::NavigationController>();
-    const auto list = std::make_shared<ui::ViewController>();
+    const auto stack = std::make_shared<kit::NavigationController>();
+    const auto list = std::make_shared<kit::ViewController>();
     stack->setViewControllers({list, screen}, false);
     stack->beginAppearance(true, false);
     stack->endAppearance();
     EXPECT_TRUE(screen->isDownloading());
     // Under another screen it goes on.
-    stack->pushViewController(std::make_shared<ui::ViewController>(), false);
+    stack->pushViewController(std::make_shared<kit::ViewController>(), false);
     EXPECT_TRUE(screen->isDownloading());
     stack->setViewControllers({list}, false);
     EXPECT_FALSE(screen->isDownloading());

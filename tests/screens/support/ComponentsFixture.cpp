@@ -13,7 +13,7 @@
 namespace testing_support {
 
 using platform::Url;
-using platform::components::DocumentListController;
+using screens::DocumentListController;
 
 namespace {
 
@@ -61,7 +61,7 @@ void RecordingListDelegate::documentListControllerURLWasRemoved(const List& list
 }
 
 void RecordingListDelegate::documentListControllerPerformActionURLOriginatingViewCompletion(
-    const List&, int action, const Url& url, const std::shared_ptr<platform::ui::View>&, const Completion&)
+    const List&, int action, const Url& url, const std::shared_ptr<kit::View>&, const Completion&)
 {
     _lines.push_back("action " + std::to_string(action) + " " + url.lastPathComponent());
 }

@@ -77,7 +77,7 @@ public:
 };
 
 /// Writes down what a folder list reports, one line each.
-class RecordingListDelegate : public platform::components::DocumentListControllerDelegate {
+class RecordingListDelegate : public screens::DocumentListControllerDelegate {
 public:
     void documentListControllerDidSelectContainerWithViewController(
         const List& list, const List& container) override;
@@ -85,11 +85,11 @@ public:
     void documentListControllerItemsChanged(const List& list) override;
     void documentListControllerURLWasRemoved(const List& list) override;
     void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,
-        const platform::Url& url, const std::shared_ptr<platform::ui::View>& view,
+        const platform::Url& url, const std::shared_ptr<kit::View>& view,
         const Completion& completion) override;
 
     void documentListControllerRequestsEditing(const List& list) override;
-    std::shared_ptr<platform::ui::ViewController> documentListControllerViewControllerForPreviewingItemAtURL(
+    std::shared_ptr<kit::ViewController> documentListControllerViewControllerForPreviewingItemAtURL(
         const List&, const platform::Url&) override
     {
         return preview;
@@ -97,7 +97,7 @@ public:
 
     std::vector<std::string> take();
 
-    std::shared_ptr<platform::ui::ViewController> preview; ///< what a peek shows
+    std::shared_ptr<kit::ViewController> preview; ///< what a peek shows
     bool allowsEditing = false;
 
 private:
@@ -108,7 +108,7 @@ private:
 /// from the test, unless it asks for the real ones.
 class ComponentsFixture : public testing::Test {
 protected:
-    using List = std::shared_ptr<platform::components::DocumentListController>;
+    using List = std::shared_ptr<screens::DocumentListController>;
 
     ComponentsFixture();
 

@@ -37,19 +37,19 @@ protected:
 };
 
 /// Writes down the exact changes that a list's peer is told.
-struct RecordingListObserver : platform::ui::ListViewObserver {
-    using ListView = platform::ui::ListView;
+struct RecordingListObserver : kit::ListViewObserver {
+    using ListView = kit::ListView;
 
     void rowsWereReset(ListView&) override { ++resets; }
-    void rowsDidChange(ListView&, const platform::ui::ListChanges& changes) override { last = changes; }
+    void rowsDidChange(ListView&, const kit::ListChanges& changes) override { last = changes; }
     void rowDidChange(ListView&, std::size_t index) override { changedRows.push_back(index); }
     void selectionDidChange(ListView&) override { }
-    void scrollToRow(ListView&, std::size_t, platform::ui::RowPosition, bool) override { }
+    void scrollToRow(ListView&, std::size_t, kit::RowPosition, bool) override { }
     void focusRow(ListView&, std::size_t) override { }
     void refreshStateDidChange(ListView&) override { }
 
     int resets = 0;
-    platform::ui::ListChanges last;
+    kit::ListChanges last;
     std::vector<std::size_t> changedRows;
 };
 

@@ -1,0 +1,14 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
+#pragma once
+
+namespace platform {
+}
+
+/// The screens call the platform's services and values by their own names.
+namespace screens {
+
+using namespace platform;
+
+} // namespace screens
