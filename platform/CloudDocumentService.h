@@ -12,16 +12,23 @@
 
 namespace platform {
 
-/// The cloud document service, by the roles it plays.
+/// The cloud document service, divided into the roles that it plays. Each role's header says what it answers
+/// and on which threads. The roles live as long as the service, so the references stay valid until then.
 class CloudDocumentService {
 public:
     virtual ~CloudDocumentService() = default;
 
+    /// Who is signed in, and how much space the account has.
     virtual CloudAccount& account() = 0;
+    /// The items of the drive and their attributes, whether they are here or only promised.
     virtual PromisedItems& promisedItems() = 0;
+    /// The drive's top level and the app libraries.
     virtual DocumentContainers& containers() = 0;
+    /// Places, downloads and bookmarks of items.
     virtual CloudItems& items() = 0;
+    /// The numbers by which documents are found again.
     virtual DocumentIdentifiers& documentIdentifiers() = 0;
+    /// Access to locations that the system grants for a while only.
     virtual SecurityScopedAccess& securityScopedAccess() = 0;
 };
 

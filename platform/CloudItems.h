@@ -13,49 +13,64 @@
 
 namespace platform {
 
-/// The code in errorDomain::cloud for what no bookmark string can name. It is an ordinary answer, no fault.
+/// The code in errorDomain::cloud for an item that no bookmark string can name. It is an ordinary answer, no
+/// fault, so it is not logged as one.
 inline constexpr int notBookmarkableCode = 7;
 
-/// Where items of the drive lie, and the texts that name them on other devices.
+/// Where items of the drive lie, how their contents come and go, and the texts that name them on other
+/// devices.
 class CloudItems {
 public:
     virtual ~CloudItems() = default;
 
-    /// Whether a URL lies in the documents area (compared name by name, after resolving links in the folders
-    /// that lead to it). Any thread.
+    /// Whether a URL lies in the documents area, the folder of all containers. The names are compared after
+    /// the links in the folders that lead to the item were resolved; a link as the last name counts as
+    /// itself. The item need not be there. Any thread may ask; the call costs a few system calls.
     virtual bool isInDocumentsArea(const Url& url) const = 0;
-    /// Whether a URL lies in the drive's trash. Any thread.
+    /// Whether a URL lies in the drive's trash, in the same way.
     virtual bool isInTrash(const Url& url) const = 0;
 
-    /// The path with every symbolic link in it resolved as far as it exists. Any thread.
+    /// Answers the location with every symbolic link in its path resolved, the last name's too, as far as the
+    /// path exists. It is the very same object when there is nothing to resolve, and when there are too many
+    /// links. Any thread.
     virtual Url realURL(const Url& url) const = 0;
 
-    /// Removes the downloaded copy of a document and keeps it in the cloud; one that is only promised is no
-    /// error. Errors: FileErrorCode::NoSuchItem, FileErrorCode::Unsupported for what is no document,
-    /// FileErrorCode::Cancelled for one that changes meanwhile, else the system's. Any thread.
+    /// Removes the downloaded copy of a document and keeps the content in the cloud; a promise takes the
+    /// document's place. A document that is only promised already is no error. Errors:
+    /// FileErrorCode::NoSuchItem; FileErrorCode::Unsupported for what is no document;
+    /// FileErrorCode::ItemExists when a promise of another content lies beside it; FileErrorCode::Cancelled
+    /// when the document changes meanwhile; else the system's. The document stays whole after every error.
+    /// Any thread; the call waits for the disk.
     virtual std::optional<Error> evictItem(const Url& url) = 0;
 
-    /// Makes the bookmark string that names a document on the account's other devices; it outlives moves and
-    /// new names of the document. The completion is called once, on any thread; with notBookmarkableCode for
-    /// what no other device could open (it lies outside the drive's documents, or is not there).
+    /// Makes the bookmark string that names a document on the account's other devices; it stays valid when
+    /// the document is moved or renamed, because it holds the document's identifier beside its place. The
+    /// completion is called once, on any thread. Its error has notBookmarkableCode for what no other device
+    /// could open: an item that lies outside the drive's documents or is not there, and every item while
+    /// nobody is signed in.
     virtual void RZBookmarkableStringFromDocumentURL(
         const Url& url, std::function<void(Result<std::string>)> completion) const = 0;
 
-    /// Brings the content of a promised document here, in the background, and puts the document in the
-    /// promise's place. One that is here already is no error, and its handlers are called, too. Any thread.
-    /// Who asks for the same document meanwhile waits for the same download.
+    /// Downloads the content of a promised document in the background and puts the document in the promise's
+    /// place. The handlers are called on the main queue. A document that is here already is no error: its
+    /// completion is called with nothing. All who ask for the same document meanwhile share one download,
+    /// which ends early when the last of them cancels. Any thread.
     virtual std::unique_ptr<ItemDownload> startDownload(const Url& url, DownloadHandlers handlers) = 0;
-    /// The same without a handle: it goes on until it ends or is cancelled by `cancelDownload`, and the
-    /// completion is called once, on the main queue.
+    /// Does the same without a handle: the download goes on until it ends or `cancelDownload` ends it. The
+    /// completion may be empty; it is called once, on the main queue.
     virtual void download(const Url& url, std::function<void(const std::optional<Error>&)> completion) = 0;
-    /// How much of a document has arrived that anybody downloads; nothing while nobody does.
-    /// Notification::DownloadsDidChange says when to ask again. Any thread.
+    /// Answers how much of a document has arrived, whoever downloads it; nothing while nobody does.
+    /// Notification::DownloadsDidChange is posted whenever the answer changes. Any thread; the disk is not
+    /// asked.
     virtual std::optional<DownloadProgress> downloadProgress(const Url& url) const = 0;
-    /// Ends a document's download for all who wait for it: they hear FileErrorCode::Cancelled. Any thread.
+    /// Ends a document's download for all who wait for it: their completions hear FileErrorCode::Cancelled.
+    /// Nothing happens when nobody downloads it. Any thread.
     virtual void cancelDownload(const Url& url) = 0;
 
-    /// Finds the document that a bookmark string from another device names. The completion is called once, on
-    /// any thread, with the URL or the error (damaged, too large, unknown account or document).
+    /// Finds the document that a bookmark string from another device names: by its identifier wherever it was
+    /// moved, else at the place that the bookmark gives. The completion is called once, on any thread, with
+    /// the document's URL, or with an error of the cloud domain when the text is damaged or longer than 4,096
+    /// bytes, belongs to another account, or when the document is not in the drive any more.
     virtual void decodeBookmark(
         const std::string& bookmark, std::function<void(Result<Url>)> completion) const = 0;
 };

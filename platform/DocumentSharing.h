@@ -13,34 +13,44 @@
 
 namespace platform {
 
-/// The scheme of URLs that lead into this program.
+/// The scheme of the URLs that lead into this program; the desktop entry claims it.
 inline constexpr std::string_view applicationScheme = "tarrowdriveapp";
 
-/// The URL that shows an item of the drive in this program, wherever it is opened. Its path is encoded twice,
-/// as the path is decoded once as a URL's and once as the item's.
+/// Answers the URL that shows an item of the drive in this program, wherever it is opened, as in
+/// "tarrowdriveapp:///home/mira/Notes.txt". Its path is percent-encoded twice, because it is decoded once as
+/// the path of this URL and once as the path of the item's own. Any thread.
 std::string linkToItem(const Url& item);
 
-/// Hands documents to other programs of the desktop. Main thread.
+/// Hands documents to other programs of the desktop. Main thread only; no call waits for another program.
 class DocumentSharing {
 public:
-    /// Called once, on the main queue, with why it could not be done, or nothing. What the person does in the
-    /// other program is not waited for, except for printing, which ends with its dialog.
+    /// Called once, on the main thread, after the call that it was given to has returned: with an error when
+    /// the other program could not be reached, whose description is a sentence for the user, and otherwise
+    /// with nothing. What the person then does in the other program is not waited for, except for printing,
+    /// which ends with its dialog.
     using Completion = std::function<void(std::optional<Error>)>;
 
     virtual ~DocumentSharing() = default;
 
+    /// Puts a text on the clipboard. Without a display nothing happens.
     virtual void copyText(const std::string& text) = 0;
 
+    /// Whether a mail program is set up that takes attachments. The answer may change while the program runs.
     virtual bool canSendByMail() const = 0;
-    /// Begins a new message with the document attached.
+    /// Begins a new message with the document attached and its name as the subject. The document must be
+    /// here: the mail program reads the file by itself.
     virtual void sendByMail(const Url& document, Completion completion) = 0;
 
-    /// Shows an item, selected, in the file manager.
+    /// Shows an item, selected, in the file manager. Where no file manager answers on the session bus, the
+    /// folder that holds the item is opened instead.
     virtual void showInFileManager(const Url& item, Completion completion) = 0;
 
-    /// Whether documents of this name's type can be printed; the content is not looked at.
+    /// Whether a document of this name can be printed, judged by the type of its extension (PDF, picture or
+    /// text); the content is not looked at.
     virtual bool canPrint(const Url& document) const = 0;
-    /// Asks how, then prints. A person who thinks better of it is no error.
+    /// Reads the document in the background, shows the print dialog and prints. When the person cancels the
+    /// dialog the completion is called with nothing, because that is no error. Errors:
+    /// FileErrorCode::Unsupported for what cannot be printed, else those of reading the document.
     virtual void print(const Url& document, Completion completion) = 0;
 };
 

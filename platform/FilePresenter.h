@@ -14,45 +14,49 @@ namespace platform {
 
 class OperationQueue;
 
-/// Something that shows an item, or keeps it open, and wants to hear what happens to it. The first two calls
-/// come on any thread, all others as operations of the presenter's queue, several at once if that queue runs
-/// several.
+/// An object that shows an item, or keeps it open, and wants to hear what happens to it. It is registered
+/// with the FileCoordinator. The first two calls come on any thread; all others come as operations of the
+/// presenter's queue, several at once when that queue runs several.
 ///
-/// Coordinated writes of this process ask before they change anything. What other processes do, coordinated
-/// or not, is told within a second after it was done, once for all that one program does to save: nobody can
-/// be asked there. Of what lies in a presented folder only its direct items are told of then. An item that is
-/// replaced by another one, as most programs save, has changed and was not deleted.
+/// Coordinated writes of this process ask the presenter before they change anything. What other processes do,
+/// coordinated or not, is told within a second after it was done, and once for all steps of a program's save;
+/// the presenter cannot be asked before, because the coordinator learns of it from the file system. A
+/// presented folder hears of its direct items alone then. An item that is replaced by another one, as most
+/// programs save, has changed and was not deleted.
 class FilePresenter {
 public:
-    /// Called once, on any thread, with why the deletion must not go on, or nothing. A handler that is
-    /// dropped without a call counts as called with nothing.
+    /// The presenter calls this once, on any thread: with nothing when the deletion may go on, else with why
+    /// it must not. The first call counts. A handler that is dropped without a call counts as called with
+    /// nothing.
     using CompletionHandler = std::function<void(const std::optional<Error>&)>;
 
     virtual ~FilePresenter() = default;
 
-    /// The item or folder that is presented; nothing for none at this time. Asked anew at every write. Who
-    /// presents another item without having been told of a move is removed and added again.
+    /// Answers the item or folder that is presented; nothing while there is none. It is asked anew at every
+    /// write, so it must be quick. A presenter that turns to another item, without having been told of a
+    /// move, must be removed and added again.
     virtual std::optional<Url> presentedItemURL() = 0;
-    /// Where the calls below are to run; null: nothing is told.
+    /// Answers the queue on which the calls below are to run. With null the presenter hears nothing.
     virtual std::shared_ptr<OperationQueue> presentedItemOperationQueue() = 0;
 
-    /// The item, or something in the presented folder, may have changed. Once after each write of this
-    /// process; several writes of others may be told together.
+    /// The item, or something in the presented folder, may have changed. This comes once after each write of
+    /// this process; several writes of other processes may be told together.
     virtual void presentedItemDidChange() { }
-    /// The item is about to be moved by this process. The writer waits, within limits, until this returns.
+    /// This process is about to move the item, or a folder that it lies in. The writer waits until this
+    /// returns, for a limited time.
     virtual void presentedItemWillMoveToURL(const Url& newURL) { static_cast<void>(newURL); }
     /// The item, or a folder that it lies in, was moved and is at a new location now.
     virtual void presentedItemDidMoveToURL(const Url& newURL) { static_cast<void>(newURL); }
 
-    /// The item, or a folder that it lies in, is about to be deleted. The writer waits, within limits, for
-    /// the completion. Where another process deleted it, it is gone already, and what the completion is
-    /// called with makes no difference.
+    /// The item, or a folder that it lies in, is about to be deleted. The writer waits for the completion,
+    /// for a limited time. When another process deleted the item it is gone already, and the completion's
+    /// argument makes no difference.
     virtual void accommodatePresentedItemDeletionWithCompletionHandler(CompletionHandler completion)
     {
         completion(std::nullopt);
     }
-    /// The same for something in the presented folder, at any depth; also for a direct item that another
-    /// process moved away.
+    /// Does the same for something in the presented folder, at any depth; it also comes for a direct item
+    /// that another process moved away.
     virtual void accommodatePresentedSubitemDeletionAtURLCompletionHandler(
         const Url& url, CompletionHandler completion)
     {

@@ -15,43 +15,58 @@
 
 namespace platform {
 
-enum class FolderEntryKind : std::uint8_t { Document, Package, Folder, Library, Link };
+/// What a folder's list shows an item as. It is judged by the name and by the file system's type alone.
+enum class FolderEntryKind : std::uint8_t {
+    Document,
+    Package, ///< a folder that is shown as one document
+    Folder,
+    Library, ///< an app library, which lies elsewhere
+    Link, ///< a symbolic link, which is not followed
+};
 
 /// One item of a folder as its list needs it: what is known without touching the item itself.
 struct FolderEntry {
-    std::string_view
-        name; ///< the logical name, as the bytes that the file system has; lives as long as the snapshot
+    /// The logical name, as the bytes that the file system has, valid UTF-8 or not. It lives as long as the
+    /// snapshot.
+    std::string_view name;
     FolderEntryKind kind;
     bool isPromise; ///< only a promise of the item is here
 };
 
+/// How far the reading of a folder was when its snapshot was made.
 enum class ListingStage : std::uint8_t {
-    FirstRows, ///< the first rows in their final order; more follow
-    Complete,
+    FirstRows, ///< the first rows in their final order; the complete list follows
+    Complete, ///< all rows
     Failed, ///< the folder could not be read, or not to its end; error() says why
 };
 
 class FolderSnapshot;
 
-/// The exact way from one snapshot of a folder to another that was made of it. All indexes rise.
+/// The exact difference between a snapshot of a folder and the one that it was made from, so that a list can
+/// be changed row by row. The indexes of each vector rise.
 struct FolderRevision {
+    /// The earlier snapshot. A list that shows another one cannot use the revision.
     std::weak_ptr<const FolderSnapshot> before;
-    std::vector<std::uint32_t> removed; ///< in the snapshot before
-    std::vector<std::uint32_t> inserted; ///< in the new one; a name may be both, when its place changed
-    std::vector<std::uint32_t>
-        touched; ///< in the new one: kept their places, but may be or hold another thing
+    /// The entries that went, by their indexes in the earlier snapshot.
+    std::vector<std::uint32_t> removed;
+    /// The entries that came, by their indexes in the new snapshot. An entry whose place changed was removed
+    /// and inserted.
+    std::vector<std::uint32_t> inserted;
+    /// The entries that kept their places but may be another item now or hold another content, by their
+    /// indexes in the new snapshot.
+    std::vector<std::uint32_t> touched;
 };
 
-/// The items of one folder at one moment, sorted, packed (about 12 bytes and the name for each item).
-/// Immutable; any thread.
+/// The items of one folder at one moment, sorted, and packed: each takes about 12 bytes and its name. A
+/// snapshot is immutable, so any thread may use it.
 class FolderSnapshot {
 public:
-    /// An item that lies elsewhere but shows in the folder: an app library at the top of the drive.
+    /// An item that lies elsewhere but shows in the folder, such as an app library at the drive's top level.
     struct ExtraItem {
-        Url url;
-        std::string name;
+        Url url; ///< where the item lies
+        std::string name; ///< the name that it shows and is sorted by
         FolderEntryKind kind = FolderEntryKind::Library;
-        std::string iconName;
+        std::string iconName; ///< in the icon theme; empty for the kind's own icon
         bool operator==(const ExtraItem&) const = default;
     };
 
@@ -59,19 +74,23 @@ public:
 
     const Url& folder() const { return _folder; }
     ListingStage stage() const { return _stage; }
+    /// Why the folder could not be read; nothing unless the stage is Failed.
     const std::optional<Error>& error() const { return _error; }
 
+    /// The number of entries. All indexes below are less than it, which is not checked.
     std::size_t count() const { return _records.size(); }
     FolderEntry entry(std::size_t index) const;
     FolderEntryKind kind(std::size_t index) const { return _records[index].kind; }
-    /// The item's logical location.
+    /// The entry's logical location, made anew by every call.
     Url url(std::size_t index) const;
-    /// The extra item behind an entry; null for an item of the folder itself.
+    /// The extra item behind an entry; null for an item of the folder itself. It lives as long as the
+    /// snapshot.
     const ExtraItem* extraItem(std::size_t index) const;
 
-    /// How it came from the snapshot before it; nothing when the folder was read whole.
+    /// How this snapshot differs from the one before; nothing when the folder was read whole.
     const std::optional<FolderRevision>& revision() const { return _revision; }
-    /// Whether most of the bytes that it keeps are names of items that have gone.
+    /// Whether most of the bytes that the snapshot keeps are names of items that have gone, so that reading
+    /// the folder whole would save memory. It looks at every entry.
     bool isMostlyWaste() const;
 
 private:
@@ -100,26 +119,31 @@ private:
     std::vector<ExtraItem> _extras;
 };
 
-/// Packs entries, given in their final order, into a snapshot.
+/// Packs entries, which are given in their final order, into a snapshot. One thread uses it, once.
 class FolderSnapshot::Builder {
 public:
     explicit Builder(Url folder)
         : _snapshot(new FolderSnapshot(std::move(folder)))
     {
     }
-    /// Begins a revision: the names of the snapshot before are shared with it rather than copied.
+    /// Begins a revision of an earlier snapshot: their names are shared rather than copied, as far as that
+    /// goes.
     explicit Builder(const FolderSnapshot& before);
 
+    /// Takes the memory for so many entries and bytes of names at once.
     void reserve(std::size_t entries, std::size_t nameBytes);
+    /// Adds an entry at the end; the name, of at most 65,535 bytes, is copied. A snapshot holds 4 GiB of
+    /// names.
     void append(std::string_view name, FolderEntryKind kind, bool isPromise);
     void append(ExtraItem item);
-    /// Takes over entries of the snapshot that this is a revision of, all at once, or one that is another
-    /// thing now.
+    /// Adds entries of the earlier snapshot as they are: `count` of them, or one that is of another kind now.
+    /// Only a builder that revises that snapshot may do so.
     void keep(const FolderSnapshot& before, std::size_t first, std::size_t count);
     void keep(const FolderSnapshot& before, std::size_t index, FolderEntryKind kind, bool isPromise);
     std::size_t count() const { return _snapshot->count(); }
 
-    /// Ends the building; the builder is empty afterwards.
+    /// Ends the building and answers the snapshot; the builder must not be used after that. The second one
+    /// makes a complete list that is a revision.
     std::shared_ptr<const FolderSnapshot> finish(ListingStage stage, std::optional<Error> error = {});
     std::shared_ptr<const FolderSnapshot> finish(FolderRevision revision);
 

@@ -12,28 +12,36 @@
 
 namespace platform {
 
-/// An immutable picture, cheap to copy: either pixels, or the name of an icon of the platform's icon theme
-/// that is looked up where it is shown (so that it follows the theme and the scale of its window).
+/// An immutable picture. It is either pixels, or the name of an icon of the platform's icon theme, which is
+/// looked up where it is shown because it follows the theme and the scale of its window. An image is cheap to
+/// copy, because copies share their pixels; any thread may use it.
 class Image {
 public:
-    /// Pixels as 32-bit words 0xAARRGGBB in native byte order, premultiplied alpha, rows without padding.
-    /// `scale` is the number of pixels to a point.
+    /// Makes an image of pixels: 32-bit words 0xAARRGGBB in native byte order with premultiplied alpha, row
+    /// by row from the top, without padding. `scale` is the number of pixels to a point of the interface.
+    /// Pixels that are missing at the end are transparent.
     static Image fromPixels(int pixelWidth, int pixelHeight, double scale, std::vector<std::uint32_t> pixels);
 
-    /// An icon of the icon theme (the naming follows the freedesktop icon naming conventions).
+    /// Makes an image of an icon's name, by the freedesktop icon naming conventions, such as
+    /// "folder-symbolic". Whether the theme has it shows only where it is drawn.
     static Image named(std::string iconName);
 
+    /// Whether the image is an icon's name.
     bool isNamed() const { return !_data->iconName.empty(); }
+    /// The icon's name; empty for an image of pixels.
     const std::string& iconName() const { return _data->iconName; }
 
-    /// Size in points; zero for a named icon, whose size is given where it is shown.
+    /// The size in points; zero for a named icon, whose size is given where it is shown.
     Size size() const { return {_data->pixelWidth / _data->scale, _data->pixelHeight / _data->scale}; }
+    /// The size in pixels; zero for a named icon.
     int pixelWidth() const { return _data->pixelWidth; }
     int pixelHeight() const { return _data->pixelHeight; }
+    /// The number of pixels to a point.
     double scale() const { return _data->scale; }
+    /// The pixels as fromPixels() took them; empty for a named icon.
     const std::vector<std::uint32_t>& pixels() const { return _data->pixels; }
 
-    /// Two images are equal when they are the same object or name the same icon.
+    /// Two images are equal when they share their pixels or name the same icon; pixels are never compared.
     bool operator==(const Image& other) const;
 
 private:

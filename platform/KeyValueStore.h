@@ -10,12 +10,15 @@
 
 namespace platform {
 
-/// Small values that the account's devices share. What another device or program changes is told by
-/// Notification::KeyValueStoreDidChangeExternally, on the main thread, after the new values can be read.
+/// Small values that the account's devices share, such as the names and colours of tags. The program only
+/// reads them. When another device or program changes them, Notification::KeyValueStoreDidChangeExternally is
+/// posted on the main thread, and the new values can be read by then.
 class KeyValueStore {
 public:
     virtual ~KeyValueStore() = default;
-    /// The value under a key; nothing when there is none or the store cannot be read. Any thread.
+    /// Answers the value under a key; nothing when there is none, and when the store is missing or cannot be
+    /// read, which is logged with the reason. The first call reads one file of at most 1 MiB; later calls are
+    /// answered from memory. Any thread.
     virtual std::optional<PropertyValue> objectForKey(const std::string& key) const = 0;
 };
 

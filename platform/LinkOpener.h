@@ -11,15 +11,18 @@
 
 namespace platform {
 
-/// Opens pages of the web in the person's own browser.
+/// Opens pages of the web in the person's own browser. Main thread only.
 class LinkOpener {
 public:
+    /// Hears once, on the main queue, why the page could not be opened, or nothing when the browser took it
+    /// over.
     using Completion = std::function<void(std::optional<Error>)>;
 
     virtual ~LinkOpener() = default;
 
-    /// Opens an http or https URL; anything else is refused with FileErrorCode::Unsupported. The completion
-    /// is called once, on the main queue. Main thread.
+    /// Opens an http or https URL and returns at once. Anything else is refused with
+    /// FileErrorCode::Unsupported, so that a text from elsewhere cannot start another program. Other errors
+    /// are the system's, with a sentence for the user.
     virtual void openLink(const std::string& url, Completion completion) = 0;
 };
 

@@ -11,34 +11,40 @@
 
 namespace platform {
 
+/// How important a line is, the least important first.
 enum class LogLevel : std::uint8_t { Debug, Info, Warning, Error };
 
-/// One line of the log, before it is laid out.
+/// One line of the log, before its message is put together. It is valid only during the call that hands it
+/// over.
 struct LogLine {
     LogLevel level;
     std::string_view operation; ///< the full name of the operation that logs
-    unsigned line; ///< source line of the call
-    std::string_view format;
-    const std::vector<LogValue>& values;
+    unsigned line; ///< the source line of the call
+    std::string_view format; ///< the message with its placeholders
+    const std::vector<LogValue>& values; ///< what fills the placeholders, in their order
 };
 
-/// Where log lines go. Called on any thread, several at once; must not log itself.
+/// Where log lines go. Its calls come on any thread, several at once, and it must not log itself.
 class LogSink {
 public:
     virtual ~LogSink() = default;
+    /// Writes one line. It cannot fail: a line that cannot be written is lost.
     virtual void write(const LogLine& line) = 0;
-    /// Opens a named user-action activity: later lines of this thread belong to it until the next one is
-    /// opened.
+    /// Opens a named user-action activity, the thing that the person did last. The lines of this thread
+    /// belong to it until the next one is opened.
     virtual void openActivity(std::string_view label) = 0;
 };
 
-/// Replaces the process's sink; null drops every line. Call it before other threads log.
+/// Replaces the process's sink; with null every line is dropped, as it is before the first call. It must be
+/// called before other threads log, because nothing guards the exchange.
 void installLogSink(std::shared_ptr<LogSink> sink);
 
-/// The lowest level that is written (Debug at first).
+/// Sets the lowest level that is written; it is Debug at first. Any thread.
 void setLogLevel(LogLevel lowest);
 
-/// A line as it stands in the log: the tag, the level, the operation with its source line, the message.
+/// Answers a line as it stands in the log: the tag, the level, the operation with its source line, and the
+/// message, as in
+/// "(TRW)[ERROR] -[DRItem initWithURL:] (42) Failed to ...".
 std::string logLineText(const LogLine& line, PrivateValues privacy);
 
 namespace detail {
@@ -46,8 +52,10 @@ inline std::atomic<LogLevel> lowestLogLevel{LogLevel::Debug};
 void writeLogLine(const LogLine& line);
 } // namespace detail
 
-/// An operation that logs, named once in full ("-[Class first:second:]"; a class operation begins with "+").
-/// A level that is switched off costs one branch; arguments are then not turned into text.
+/// An operation that logs, named once and in full: "-[Class first:second:]", and with "+" for a class
+/// operation. It is a `static constexpr` local of the function. Its calls take a format with placeholders
+/// (see LogFormat.h), which is checked against the arguments when it is compiled. A level that is switched
+/// off costs one branch, and its arguments are not turned into text. Any thread may log; no call fails.
 class Operation {
 public:
     consteval explicit Operation(std::string_view name)
@@ -55,36 +63,42 @@ public:
     {
     }
 
+    /// The name that the operation was made with.
     constexpr std::string_view name() const { return _name; }
 
+    /// What only a developer wants to follow.
     template <typename... Args>
     void debug(LogFormat<std::type_identity_t<Args>...> format, const Args&... args) const
     {
         log(LogLevel::Debug, format, args...);
     }
+    /// What happened, as far as it explains a later problem.
     template <typename... Args>
     void info(LogFormat<std::type_identity_t<Args>...> format, const Args&... args) const
     {
         log(LogLevel::Info, format, args...);
     }
+    /// Something went wrong that the program could make up for.
     template <typename... Args>
     void warning(LogFormat<std::type_identity_t<Args>...> format, const Args&... args) const
     {
         log(LogLevel::Warning, format, args...);
     }
+    /// Something went wrong and was not done.
     template <typename... Args>
     void error(LogFormat<std::type_identity_t<Args>...> format, const Args&... args) const
     {
         log(LogLevel::Error, format, args...);
     }
 
-    /// Whether lines of this level are written, for a loop whose every turn would log.
+    /// Whether lines of this level are written, for a loop whose every turn would make arguments for a line.
     static bool isWritten(LogLevel level)
     {
         return level >= detail::lowestLogLevel.load(std::memory_order_relaxed);
     }
 
-    /// Opens the user-action activity with this label and logs the label.
+    /// Opens the user-action activity with this label, which is public, and logs the label. It is called
+    /// where the person's action arrives.
     void userAction(
         std::string_view label, std::source_location where = std::source_location::current()) const;
 

@@ -19,10 +19,12 @@
 
 namespace platform {
 
-/// One argument of a log line, brought to the few forms that a line can hold.
+/// One argument of a log line, in one of the few forms that a line can hold.
 using LogValue = std::variant<std::int64_t, std::uint64_t, double, std::string>;
 
-/// How a value reads in a log line under "%@". A type of its own becomes loggable by an overload beside it.
+/// Answers how a value reads in a log line under "%@". A type becomes loggable when an overload stands beside
+/// its declaration. Texts are taken as they are, dates read in UTC, a null pointer and an empty optional read
+/// "(null)".
 std::string logText(const std::string& value);
 std::string logText(std::string_view value);
 std::string logText(const char* value);
@@ -50,6 +52,7 @@ std::string logText(const std::vector<T>& values)
     return text + ")";
 }
 
+/// Brings an argument to the form that its placeholder needs; an enumeration counts as its number.
 template <typename T>
 LogValue logValue(const T& value)
 {
@@ -67,6 +70,7 @@ LogValue logValue(const T& value)
         return logText(value);
 }
 
+/// What a placeholder can take, which is known when the program is compiled.
 enum class LogValueKind { Integer, Real, Text };
 
 template <typename T>
@@ -74,15 +78,16 @@ constexpr LogValueKind logValueKind = std::floating_point<std::remove_cvref_t<T>
     : std::integral<std::remove_cvref_t<T>> || std::is_enum_v<std::remove_cvref_t<T>> ? LogValueKind::Integer
                                                                                       : LogValueKind::Text;
 
-/// One placeholder of a format: where it stands, and what it takes.
+/// One placeholder of a format: where it stands and what it takes.
 struct LogPlaceholder {
-    std::size_t begin = 0, end = 0;
+    std::size_t begin = 0,
+                end = 0; ///< the placeholder's bytes in the format, from '%' to behind its last letter
     char conversion = 0; ///< '@', 's', 'd', 'u' or 'f'; '%' for a literal percent sign
     bool isPublic = false; ///< marked {public}; only "%@" can be private
 };
 
-/// The next placeholder at or after `from`; its `conversion` is 0 when there is none, '?' when it is not
-/// understood. Understood: %@ %{public}@ %s %d %ld %lld %zd %u %lu %llu %zu %g %f %lf %%.
+/// Finds the next placeholder at or after `from`. Its `conversion` is 0 when there is none and '?' when it is
+/// not understood. These are understood: %@ %{public}@ %s %d %ld %lld %zd %u %lu %llu %zu %g %f %lf %%.
 constexpr LogPlaceholder nextPlaceholder(std::string_view format, std::size_t from)
 {
     const auto percent = format.find('%', from);
@@ -115,11 +120,12 @@ constexpr LogPlaceholder nextPlaceholder(std::string_view format, std::size_t fr
     return found;
 }
 
-/// Stops the compilation with its name when a format and its arguments disagree.
+/// Is never defined. A format that disagrees with its arguments calls it while it is compiled, so that the
+/// compiler's message names it.
 void logFormatAndArgumentsDisagree();
 
-/// A log format whose placeholders were checked against the arguments' types when it was compiled, with the
-/// place of the call.
+/// A log format together with the place of the call. It is made from a literal while the program is compiled,
+/// and its placeholders are checked against the arguments' types there.
 template <typename... Args>
 struct LogFormat {
     std::string_view text;
@@ -154,9 +160,10 @@ private:
     }
 };
 
-/// The message of a format and its values. Private values ("%@" without {public}) read "<private>" unless
-/// shown.
+/// Whether a message shows what may tell something of the person: names and places of documents.
 enum class PrivateValues { Shown, Hidden };
+/// Puts a message together. The value of a "%@" without {public} is private and reads "<private>" when such
+/// values are hidden; all others are always shown. A placeholder without a value is left out.
 std::string formatLogMessage(
     std::string_view format, const std::vector<LogValue>& values, PrivateValues privacy);
 

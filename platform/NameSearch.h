@@ -14,43 +14,50 @@
 
 namespace platform {
 
-/// One item whose name was searched for.
+/// One item that a search found.
 struct FoundItem {
-    Url url; ///< the logical location
+    Url url; ///< the item's logical location
     FolderEntryKind kind = FolderEntryKind::Document;
-    bool isPromise = false;
+    bool isPromise = false; ///< only a promise of the item is here
 };
 
+/// What a search knows at one moment.
 struct NameSearchResults {
-    std::string query; ///< what was searched for
-    /// The best ones first: names that begin with the query, then those with a word that does, then the
-    /// others; at most NameSearch::shownItems.
+    std::string query; ///< the text that was searched for, as it was given
+    /// The items that were found, the best ones first: those whose names begin with the query, then those
+    /// with a word that begins with it, then all others. There are at most NameSearch::shownItems.
     std::vector<FoundItem> items;
-    std::size_t total = 0; ///< all items that were found
-    bool isComplete = false; ///< all names are known; until then there may be more
+    std::size_t total = 0; ///< how many items were found, also those that `items` leaves out
+    bool isComplete = false; ///< all names were searched; until then more may be found
 };
 
-/// A search that goes on while the person types. Destroying it ends it: its callback is not called any more.
+/// A search that goes on while the person types. Destroying it, on the main thread, ends it; its callback is
+/// not called after that.
 class NameSearchSession {
 public:
     virtual ~NameSearchSession() = default;
-    /// Searches for another text from now on; an empty one finds nothing. Main thread.
+    /// Searches for another text from now on, in place of the one before; an empty text finds nothing. The
+    /// call returns at once. Main thread.
     virtual void setQuery(std::string query) = 0;
 };
 
-/// Searches the names of all items below some folders, packages' contents and hidden items left out. Every
-/// word of a query must stand in the name; case and accents make no difference.
+/// Searches the names of all items below some folders, here or promised. Hidden items and what lies inside
+/// packages are left out, links are not followed, and contents are never read. Every word of a query must
+/// stand in the name; letter case and accents make no difference.
 class NameSearch {
 public:
+    /// Takes the results of the session's present query.
     using Update = std::function<void(NameSearchResults)>;
 
+    /// The most items that one answer lists; a person who sees so many types another letter.
     static constexpr std::size_t shownItems = 200;
 
     virtual ~NameSearch() = default;
 
-    /// Begins to learn the names below the folders, and follows their changes within a few seconds. `update`
-    /// is called on the main queue for each query, again when more names are known and when the results may
-    /// have changed, never for a query that was replaced. Main thread.
+    /// Begins a search below some folders: their names are read in the background and read again every two
+    /// seconds where something changed. `update` is called on the main queue for each query, and again when
+    /// more names are known and when names changed; it is never called for a query that was replaced. A
+    /// folder that cannot be read is left out. Main thread.
     virtual std::shared_ptr<NameSearchSession> begin(std::vector<Url> folders, Update update) = 0;
 };
 

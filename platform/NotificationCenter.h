@@ -11,21 +11,24 @@
 
 namespace platform {
 
-/// The notices that travel through the notification center.
+/// The notices that travel through the notification center. Their user information is empty unless a comment
+/// says otherwise.
 enum class Notification {
-    ApplicationDidBecomeActive,
-    ApplicationWillResignActive,
-    ApplicationWillTerminate, ///< nothing that is put in a queue now will run
-    CloudIdentityDidChange,
-    StorageOfferDidChange,
-    DownloadsDidChange, ///< one began, got on or ended; user information: "url", the document's
-    ActivityOffersDidChange, ///< what other devices hand over; see ActivityHandOver
-    KeyValueStoreDidChangeExternally,
-    KeyboardWillShow, ///< user information: "height" in points
-    KeyboardWillHide,
+    ApplicationDidBecomeActive, ///< the launch ended, or the window got the focus
+    ApplicationWillResignActive, ///< the window lost the focus or was closed, or the process is ending
+    ApplicationWillTerminate, ///< the process ends: work that is put into a queue now does not run any more
+    CloudIdentityDidChange, ///< another account, or none, is signed in; see CloudAccount
+    StorageOfferDidChange, ///< there is another offer, or none any more; see StorageOfferManager
+    DownloadsDidChange, ///< a download began, got on or ended; user information: "url", the document's
+    ActivityOffersDidChange, ///< other devices offer other activities; see ActivityHandOver
+    KeyValueStoreDidChangeExternally, ///< another program changed the values; see KeyValueStore
+    KeyboardWillShow, ///< the keyboard on the screen appears; user information: "height" in points
+    KeyboardWillHide, ///< the keyboard on the screen goes away
 };
 
-/// Keeps an observer registered for as long as it lives. Destroying it stops the calls at once.
+/// Keeps an observer registered for as long as this object lives. Destroying it, on the main thread, stops
+/// the calls at once, also while a notice is being delivered. One that was made without a registration holds
+/// nothing.
 class Observation {
 public:
     Observation() = default;
@@ -38,8 +41,8 @@ private:
     std::shared_ptr<void> _registration;
 };
 
-/// Tells observers of notices, in the order in which they registered, on the thread that posts.
-/// Registering and posting are main-thread affairs.
+/// Tells observers of notices, in the order in which they registered. It is used on the main thread alone:
+/// observers register there, notices are posted there, and observers are called there, before post() returns.
 class NotificationCenter {
 public:
     using Observer = std::function<void(const PropertyDictionary& userInfo)>;
@@ -47,8 +50,9 @@ public:
     NotificationCenter();
     ~NotificationCenter();
 
+    /// Registers an observer for one kind of notice. It hears of notices until the answer is destroyed.
     [[nodiscard]] Observation observe(Notification notification, Observer observer);
-    /// An observer that is added while a notice is delivered first hears the next one.
+    /// Delivers a notice to its observers. An observer that registers meanwhile hears only of later ones.
     void post(Notification notification, const PropertyDictionary& userInfo = {});
 
 private:

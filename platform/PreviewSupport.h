@@ -7,12 +7,13 @@
 
 namespace platform {
 
-/// What the preview can show.
+/// Tells which documents the quick preview has a view for.
 class PreviewSupport {
 public:
     virtual ~PreviewSupport() = default;
-    /// Whether the preview has a view for what is at this location, judged by its type; the content is not
-    /// read. Any thread.
+    /// Whether the preview has a view for the document at a location. It is judged by the type of the name's
+    /// extension; the content is not read, and the document need not be here. The answer is false for folders
+    /// and for what is no file URL. Any thread.
     virtual bool canPreview(const Url& url) const = 0;
 };
 

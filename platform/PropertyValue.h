@@ -16,19 +16,25 @@
 
 namespace platform {
 
+/// Bytes that nobody interprets.
 using Data = std::vector<std::byte>;
 
 class PropertyValue;
+/// An ordered list of values.
 using PropertyArray = std::vector<PropertyValue>;
+/// Values under keys that are texts; it can be asked with a string_view without a copy.
 using PropertyDictionary = std::map<std::string, PropertyValue, std::less<>>;
 
-/// A value that can be kept: in user-information maps, archives, the key-value store and saved interface
-/// state.
+/// A value that can be kept: in an error's or a notice's user information, in archives, in the key-value
+/// store and in saved interface state. It is null, a boolean, a number, a text, data, a date, a URL, an array
+/// or a dictionary. It is a plain value: a copy shares nothing that can change.
 class PropertyValue {
 public:
+    /// The kinds in which a value is held. Integers keep the signedness that they came with.
     using Variant = std::variant<std::monostate, bool, std::int64_t, std::uint64_t, double, std::string, Data,
         Date, Url, PropertyArray, PropertyDictionary>;
 
+    /// Makes the null value; the constructors below make a value of their argument's kind.
     PropertyValue() = default;
     PropertyValue(bool value)
         : _value(value)
@@ -79,28 +85,33 @@ public:
     {
     }
 
+    /// The value for std::visit.
     const Variant& variant() const { return _value; }
+    /// Whether the value is null.
     bool isNull() const { return std::holds_alternative<std::monostate>(_value); }
 
-    /// The value when it is of just this kind, else null.
+    /// The value when it is of exactly this kind of Variant, else a null pointer: an int64_t is not found as
+    /// a double.
     template <typename T>
     const T* get() const
     {
         return std::get_if<T>(&_value);
     }
 
-    /// Any of the number kinds as an integer of this width; nothing for another kind, for a fraction and for
-    /// a number that does not fit.
+    /// Answers a value of any of the number kinds as an integer. It answers nothing for another kind (a
+    /// boolean is no number), for a fraction and for a number that does not fit.
     std::optional<std::int64_t> asInteger() const;
     std::optional<std::uint64_t> asUnsigned() const;
 
+    /// Two values are equal when their kinds and contents are: 1 as a double is not 1 as an integer.
     bool operator==(const PropertyValue&) const = default;
 
 private:
     Variant _value;
 };
 
-/// The value under a key; null when the dictionary has none.
+/// Finds the value under a key; null when the dictionary has none. The pointer is valid until the dictionary
+/// changes.
 const PropertyValue* find(const PropertyDictionary& dictionary, std::string_view key);
 
 } // namespace platform

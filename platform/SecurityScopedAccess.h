@@ -7,15 +7,17 @@
 
 namespace platform {
 
-/// Leave to use a location that the system grants for a while only (a document that the user picked outside
-/// the drive). Any thread.
+/// Permission to use a location that the system grants for a while only, such as a document that the user
+/// picked outside the drive. The local drive needs none, so its answers are all false. Any thread may call.
 class SecurityScopedAccess {
 public:
     virtual ~SecurityScopedAccess() = default;
 
-    /// Begins access and answers whether it was begun; false where the location needs no leave, or has none.
+    /// Begins access to a location and answers whether access was begun. False is no failure: the location
+    /// needs no permission, or there is none, and using it will tell which.
     virtual bool startAccessing(const Url& url) = 0;
-    /// Ends one access that startAccessing() began. Call it once for each.
+    /// Ends one access. It must be called once for every call of startAccessing() that answered true, and for
+    /// no other.
     virtual void stopAccessing(const Url& url) = 0;
 };
 

@@ -31,36 +31,62 @@ class TextDecoder;
 class TypeRegistry;
 class UserDefaults;
 
-/// The installed platform services. A service that is not installed is null; main installs all of them.
+/// The platform's services, each behind the abstract class of its header. A service that is not installed is
+/// null: main installs all of them, and a test only those that it needs.
 struct ServiceSet {
+    /// What the account's devices show, so that another can continue it.
     std::shared_ptr<ActivityHandOver> activityHandOver;
+    /// The apps of this machine and the documents that they open.
     std::shared_ptr<AppRegistry> appRegistry;
+    /// Classes of characters, for names.
     std::shared_ptr<CharacterData> characterData;
+    /// The drive: its account, its items and its containers.
     std::shared_ptr<CloudDocumentService> cloudDocumentService;
+    /// Queues, timers and the clock.
     std::shared_ptr<Dispatch> dispatch;
+    /// Clipboard, mail, file manager and printer.
     std::shared_ptr<DocumentSharing> documentSharing;
+    /// Turns of readers and writers, within the process and between processes.
     std::shared_ptr<FileCoordinator> fileCoordinator;
+    /// Questions to the file system, and changes of the drive.
     std::shared_ptr<FileSystem> fileSystem;
+    /// Sorted lists of folders that follow their changes.
     std::shared_ptr<FolderLister> folderLister;
+    /// Numbers, sizes and dates for people.
     std::shared_ptr<Formatters> formatters;
+    /// Decoding of picture files.
     std::shared_ptr<ImageLoader> imageLoader;
+    /// Small values that the account's devices share.
     std::shared_ptr<KeyValueStore> keyValueStore;
+    /// Values as data that can be stored.
     std::shared_ptr<KeyedArchiver> keyedArchiver;
+    /// The person's web browser.
     std::shared_ptr<LinkOpener> linkOpener;
+    /// Texts in the user's language.
     std::shared_ptr<Localization> localization;
+    /// The search through the names of the drive.
     std::shared_ptr<NameSearch> nameSearch;
+    /// Notices that any part of the program may observe.
     std::shared_ptr<NotificationCenter> notificationCenter;
+    /// Documents of pages, to be read and changed.
     std::shared_ptr<PagedDocumentOpener> pagedDocumentOpener;
+    /// Which documents the quick preview can show.
     std::shared_ptr<PreviewSupport> previewSupport;
+    /// Offers of more storage for the account.
     std::shared_ptr<StorageOfferManager> storageOfferManager;
+    /// Texts in the encodings from before Unicode.
     std::shared_ptr<TextDecoder> textDecoder;
+    /// The types of documents.
     std::shared_ptr<TypeRegistry> typeRegistry;
+    /// Small values that this device keeps.
     std::shared_ptr<UserDefaults> userDefaults;
 };
 
-/// Access to the installed services. The references stay valid until the next installServices().
+/// Gives access to the installed services. The references stay valid until the next installServices(). Asking
+/// for a service that is not installed is a programming error.
 class Services {
 public:
+    /// Takes over a set; only installServices() needs this.
     explicit Services(ServiceSet set)
         : _set(std::move(set))
     {
@@ -94,8 +120,11 @@ private:
     ServiceSet _set;
 };
 
-/// The installed set. Install before use; main does so once, a test fixture for each test.
+/// The installed services, for every part of the program. Any thread may ask, and use each service as its
+/// header says.
 const Services& services();
+/// Installs a set in place of the one before. It must be called while nothing else uses the services: main
+/// does so once before the loop runs, a test fixture before and after each test.
 void installServices(ServiceSet set);
 
 } // namespace platform

@@ -9,17 +9,19 @@
 
 namespace platform {
 
-/// Whether the bytes are the whole document, or were cut somewhere.
+/// Whether bytes are a whole document or only its beginning, whose last character may be cut in two.
 enum class TextEnd { Whole, Cut };
 
-/// Reads texts of the time before Unicode, whose encodings nothing names. Any thread.
+/// Decodes texts from the time before Unicode, whose encodings nothing names. Texts that are UTF-8 or have a
+/// byte order mark are decoded by the caller and do not come here. Any thread may call, several at once.
 class TextDecoder {
 public:
     virtual ~TextDecoder() = default;
 
-    /// The text as UTF-8 in the encoding that its bytes most likely have; nothing when they do not tell. A
-    /// character that the cut went through is left out, a broken one becomes the replacement character. Takes
-    /// as long as its bytes are many.
+    /// Answers the text as UTF-8, read in the encoding that its bytes most likely have. It answers nothing
+    /// when the bytes do not tell, as when there are too few beyond ASCII; the caller then chooses an
+    /// encoding. A character that the cut went through is left out, and a broken one becomes the replacement
+    /// character. The call takes as long as the text is large.
     virtual std::optional<std::string> decode(std::string_view bytes, TextEnd end) const = 0;
 };
 

@@ -9,23 +9,28 @@
 
 namespace platform {
 
-/// Uniform type identifiers. Any thread; nothing here reads a document.
+/// Knows the types of documents. A uniform type identifier such as "public.png" names a type; on Linux a MIME
+/// type without one is "dyn.mime." and its name. Types are judged by names alone, so nothing here reads a
+/// document. Any thread may call; answers are kept, because every row of a list needs them.
 class TypeRegistry {
 public:
     virtual ~TypeRegistry() = default;
 
-    /// The preferred type for a file-name extension (without its dot, in any case); nothing for an empty or
-    /// unknown one.
+    /// Answers the preferred type for the extension of a file name, given without its dot and in any letter
+    /// case. It answers nothing for an empty or unknown extension.
     virtual std::optional<std::string> typeForExtension(std::string_view extension) const = 0;
-    /// Whether a type is another one or a kind of it.
+    /// Whether a type is another one or a kind of it, at any distance: "public.png" is a kind of
+    /// "public.image".
     virtual bool conformsTo(std::string_view type, std::string_view other) const = 0;
-    /// What the type is called, in the user's language; nothing for an unknown type.
+    /// Answers what the type is called, in the user's language, such as "PNG image"; nothing for an unknown
+    /// type.
     virtual std::optional<std::string> description(std::string_view type) const = 0;
-    /// The icon theme's name for the type's icon.
+    /// Answers the name of the type's icon in the icon theme, a general one for types without their own;
+    /// never empty.
     virtual std::string iconName(std::string_view type) const = 0;
 };
 
-/// Types with a meaning of their own in the program.
+/// The types that the program treats in a way of their own.
 namespace typeIdentifier {
 inline constexpr std::string_view data = "public.data";
 inline constexpr std::string_view content = "public.content";
