@@ -11,7 +11,9 @@
 namespace host::previews {
 
 /// Changes a PDF document with Poppler. An edit is taken back by reading the document anew and applying all
-/// the others again, so that nothing of what other programs have put into it is lost on the way.
+/// the others again, so that nothing of what other programs have put into it is lost on the way. A document
+/// whose own index cannot be found is not changed at all. What the library writes goes to memory first,
+/// because the library does not tell of a full disk. It makes no drawings by hand (ink), so there are none.
 class PopplerEditing : public platform::PagedDocumentEditing {
 public:
     static platform::Result<std::shared_ptr<platform::PagedDocumentEditing>> open(

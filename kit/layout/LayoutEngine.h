@@ -14,7 +14,10 @@ class LayoutConstraint;
 class LayoutItem;
 
 /// Lays out one tree of items: brings the active constraints and the wanted sizes into a solver, reads the
-/// frames out of it and calls `layoutSubviews` where it is due. The root item of the tree owns it.
+/// frames out of it, on whole device pixels, and calls `layoutSubviews` where it is due, until nothing is
+/// stale. The root item of the tree owns it. A constant that changes costs a few pivots; a change of
+/// structure compares all rules and adds or removes what differs. Required constraints that contradict each
+/// other are named in the log and dropped, the younger first, and are tried again when the structure changes.
 class LayoutEngine {
 public:
     explicit LayoutEngine(LayoutItem& root);

@@ -10,7 +10,8 @@ namespace kit {
 
 /// What a peer holds while it shows a transition. The model has changed already; what has to wait for the end
 /// of the movement runs once, when `finish()` is called or when the last copy of the token is destroyed, so
-/// that a peer that dies in the middle loses nothing. Main thread only.
+/// that a peer that dies in the middle loses nothing. Without an observer it runs at once, and the next
+/// change finishes what still runs. Main thread only.
 class TransitionToken {
 public:
     /// A token that is finished already.

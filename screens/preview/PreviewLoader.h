@@ -26,9 +26,11 @@ PreviewLimits previewLimitsForMainScreen();
 /// For a closer look at a picture: 24 million pixels.
 PreviewLimits previewLimitsForCloseLook();
 
-/// Reads what a preview shows of a document, never fetching one that is not downloaded. Takes as long as the
-/// reading; any thread. `isCancelled` is asked between the steps; after it answered true the content means
-/// nothing.
+/// Reads what a preview shows of a document, never fetching one that is not downloaded. Nothing but regular
+/// files is opened. Pictures of more than 100 million pixels or 256 MiB are refused, animations move up to 64
+/// MiB of frames, and of a text the first MiB is read (see ImageLimits and PreviewLimits). It takes as long
+/// as the reading; any thread. `isCancelled` is asked between the steps; after it answered true the content
+/// means nothing.
 PreviewContent loadPreview(
     const Url& url, const PreviewLimits& limits, const std::function<bool()>& isCancelled = {});
 

@@ -16,6 +16,10 @@ class CloudStore;
 /// An item that was taken out of its folder under a name that nobody else uses, so that what is looked at is
 /// what is then removed. It is put back at the end unless it was removed, and at the next start when the
 /// process was killed meanwhile (Recovery).
+///
+/// Removing it is all or nothing, for a folder too. Whether everything in it may be removed is asked first
+/// (Discarding); then it gets the name of a removal that is decided. Until its first part is gone any failure
+/// puts the whole back.
 class HeldItem {
 public:
     /// Takes the item away; `name` is its own or its promise's. `copy` is where a whole copy of it lies, if

@@ -17,6 +17,9 @@ class CloudStore;
 /// documents area; no link is followed, nothing that is mounted in a folder is entered, and nothing is
 /// replaced. Where a document and a promise lie side by side the document counts: a promise that adds nothing
 /// goes with it, one with another content behind it stays and shows again.
+///
+/// To another file system an item is moved by a copy under a temporary name, which is compared, synced and
+/// renamed; only then is the original removed, and when that fails the copy is withdrawn.
 class LocalItemChanges : public host::system::ItemChanges {
 public:
     LocalItemChanges(DriveLayout layout, std::shared_ptr<CloudStore> store)

@@ -13,6 +13,10 @@ namespace host::drive {
 
 /// A file in the making, in the folder where it will lie, under a private name until it is whole. What is not
 /// published goes at the end, and at the next start when the process was killed meanwhile.
+///
+/// It replaces a document by exchanging the two names in one step and comparing what came out with what was
+/// expected: when another program has saved meanwhile, the names are exchanged again, and nothing has
+/// changed.
 class NewFile {
 public:
     /// Makes it, empty, beside an entry; answers 0 or the errno.

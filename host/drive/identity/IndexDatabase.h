@@ -18,7 +18,9 @@ namespace host::drive {
 ///
 /// The database keeps a write-ahead log: a reader never waits for a writer, which matters on the main thread,
 /// a writer that is killed leaves nothing half done, and a commit needs no sync (a power cut costs the last
-/// changes, which the next look at those documents makes up for).
+/// changes, which the next look at those documents makes up for). A damaged database is discarded, and the
+/// index is made anew from a walk through the drive; while another process keeps it locked, that walk
+/// answers.
 class IndexDatabase {
 public:
     enum class Use : std::uint8_t { Reading, Writing };

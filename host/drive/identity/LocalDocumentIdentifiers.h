@@ -19,6 +19,10 @@ class IdentifiedItem;
 /// The index only says where to look first: an answer is always read from the file that is then open. What
 /// this program moves and removes is noted at once; what others do is noted when the item is next read, and
 /// else when it is looked up and is not where it was.
+///
+/// Numbers are drawn by chance, so that an index that was lost does not lead to one being given twice; one
+/// whose document was removed is kept as removed. Of two items with one number the one at the known inode has
+/// it, else the older one; the other gets a new number when it needs one.
 class LocalDocumentIdentifiers : public platform::DocumentIdentifiers,
                                  public std::enable_shared_from_this<LocalDocumentIdentifiers> {
 public:

@@ -7,7 +7,8 @@
 
 namespace host::drive {
 
-/// What tells this device from the account's other devices.
+/// Tells this device from the account's other devices. The identifier lies in the state folder, so that two
+/// state folders on one drive are two devices.
 struct DeviceIdentity {
     std::string identifier; ///< letters, digits and hyphens; stays the same
     std::string name; ///< as its user knows it

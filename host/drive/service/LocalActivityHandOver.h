@@ -21,8 +21,9 @@ class CloudDocumentService;
 
 namespace host::drive {
 
-/// Hands activities over by small files in the account's folder, one for each device. Make and destroy it on
-/// the main thread.
+/// Hands activities over by small files in the account's folder, one for each device. ActivityPublication
+/// keeps this device's file; what another device's file says is offered while it is recent, of the same
+/// account, and its document is here. Make and destroy it on the main thread.
 class LocalActivityHandOver : public platform::ActivityHandOver,
                               public std::enable_shared_from_this<LocalActivityHandOver> {
 public:

@@ -18,8 +18,12 @@ class GestureFeed;
 
 /// Shows one view of the kit: a canvas widget that paints the view's style and drawing, holds the native
 /// widget of the view's kind if it has one, and places the subviews' peers at the frames of the model.
-/// Changes are mirrored once a frame. It knows its view weakly, and the view knows it weakly. Main thread
-/// only.
+/// Main thread only.
+///
+/// The view tells its peer of changes at once; the peer gathers them and mirrors them in the next frame,
+/// before the layout. A frame that changes costs an allocation, never a new measurement. Peer and view know
+/// each other weakly; a peer whose view is gone ends when the main loop is idle, so never inside a signal of
+/// its own.
 class ViewPeer : public kit::ViewObserver,
                  public CanvasClient,
                  public std::enable_shared_from_this<ViewPeer> {
@@ -78,8 +82,7 @@ private:
     void mirrorGestures(const kit::View& view);
     void dropFocus();
     void queueAllocateInParent() const;
-    void snapshotBackground(
-        const kit::View& view, GtkSnapshot* snapshot, const GskRoundedRect& shape);
+    void snapshotBackground(const kit::View& view, GtkSnapshot* snapshot, const GskRoundedRect& shape);
     void snapshotBorder(const kit::View& view, GtkSnapshot* snapshot, const GskRoundedRect& shape);
     void snapshotDrawing(const kit::View& view, GtkSnapshot* snapshot);
 

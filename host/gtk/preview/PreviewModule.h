@@ -21,6 +21,10 @@ namespace host::gtk {
 
 /// Loads the libraries of the previews when they are first wanted, and keeps them. Without them the program
 /// goes on: what needs them says that they are missing.
+///
+/// The module is never unloaded, because the types that its libraries register with the toolkit cannot be. It
+/// is linked with its libraries alone and finds everything else in the program, which exports its symbols for
+/// that: so there is one copy of every class and of all state.
 class PreviewModule : public platform::PagedDocumentOpener,
                       public platform::TextDecoder,
                       public std::enable_shared_from_this<PreviewModule> {

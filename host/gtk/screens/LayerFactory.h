@@ -22,7 +22,8 @@ struct LayerSite {
     platform::Size size;
 };
 
-/// The layer of a presented screen, by the kind of screen, its style and the window's width.
+/// Makes the layer of a presented screen, by the kind of screen, its style and the window's width: in a
+/// narrow window an action sheet stands at the bottom edge, in a wide one it is a popover at its anchor.
 std::unique_ptr<PresentedLayer> makeLayer(const std::shared_ptr<PeerContext>& context, const LayerSite& site,
     const std::shared_ptr<kit::ViewController>& screen);
 

@@ -22,7 +22,8 @@ enum class LayerPlace {
     Cover, ///< all of the window
 };
 
-/// A layer within the window itself: what lies below is dimmed and takes no input.
+/// A layer within the window itself: what lies below is dimmed and takes no input. It is no window of its
+/// own, because an alert must be able to refuse to close, which not every display server lets a window do.
 class OverlayLayer : public PresentedLayer {
 public:
     /// `onOutside` is called when the user taps beside the content.

@@ -18,7 +18,8 @@ class ViewPeer;
 /// Whether the window's own buttons stand in the bars of a screen.
 enum class WindowButtons { Shown, Hidden };
 
-/// Shows one screen of the kit, with everything that it contains.
+/// Shows one screen of the kit, with everything that it contains. Sizes travel from the toolkit to the model:
+/// the toolkit gives the screen its place, and the model lays itself out in it while that place is allocated.
 class ScreenPeer {
 public:
     virtual ~ScreenPeer() = default;

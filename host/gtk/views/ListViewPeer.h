@@ -12,10 +12,16 @@
 
 namespace host::gtk {
 
-/// A GtkListView over a lazy model: only rows near the visible ones have widgets.
-class ListViewPeer : public ViewPeer,
-                     public kit::ScrollObserver,
-                     public kit::ListViewObserver {
+/// Shows a list by a GtkListView over a lazy model: only rows near the visible ones have widgets. Of many
+/// changes at once only those near the visible rows are told to the toolkit one by one
+/// (ListChanges::splicesExactWithin). A place among rows that were never laid out is reached once they have
+/// heights.
+///
+/// Keys (ListViewPeer+Keyboard.cpp): F2, Delete and Alt+Return act on a row, Space peeks at it, Menu and
+/// Shift+F10 open its menu, Ctrl+A and Shift with the arrows select, letters type ahead, Tab leaves the list.
+/// Fingers (ListViewPeer+Touch.cpp): along the check marks they select a range, on a row they hold and then
+/// press on; one that goes astray opens nothing, and a list that is seen as a whole can be pulled.
+class ListViewPeer : public ViewPeer, public kit::ScrollObserver, public kit::ListViewObserver {
 public:
     ListViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ListView>& list);
     ~ListViewPeer() override;
@@ -26,8 +32,8 @@ public:
     void rowsDidChange(kit::ListView& list, const kit::ListChanges& changes) override;
     void rowDidChange(kit::ListView& list, std::size_t index) override;
     void selectionDidChange(kit::ListView& list) override;
-    void scrollToRow(kit::ListView& list, std::size_t index, kit::RowPosition position,
-        bool animated) override;
+    void scrollToRow(
+        kit::ListView& list, std::size_t index, kit::RowPosition position, bool animated) override;
     void focusRow(kit::ListView& list, std::size_t index) override;
     void refreshStateDidChange(kit::ListView& list) override;
 

@@ -15,9 +15,17 @@
 
 namespace host::system {
 
-/// Tells presenters what other processes do to their items, coordinated or not, after it was done. Looks
-/// begin a moment after the first event, so that one save is told once; writes of this process are left out.
-/// Any thread.
+/// Tells presenters what other processes do to their items, coordinated or not, after it was done. Any
+/// thread.
+///
+/// Events of inotify only mark the presenters that must look; what is told comes of a look at the disk 50 ms
+/// after the first event, so that one save is told once. Each presented item is held by a descriptor that
+/// reads nothing, so the kernel says where it went when its place is empty; a quarter of a second later that
+/// is told as a move or as a deletion. What stands at the place counts: a save that replaces the file, a save
+/// that leaves a backup, and an eviction are changes. A drive that disappears as a whole has deleted nothing.
+/// Writes of this process are left out, because they are taken as known at their end, inside their locks.
+/// When the kernel lost events every presenter looks; when it has no watches left they look every five
+/// seconds, which one line of the log says.
 class PresenterWatch : public std::enable_shared_from_this<PresenterWatch> {
 public:
     struct OwnWrite {
