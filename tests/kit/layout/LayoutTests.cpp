@@ -59,7 +59,8 @@ protected:
         installLogSink(nullptr);
     }
 
-    void format(const std::string& text, std::map<std::string, std::shared_ptr<View>, std::less<>> views)
+    void format(
+        const std::string& text, std::map<std::string, std::shared_ptr<LayoutItem>, std::less<>> views)
     {
         const auto result = VisualFormat::parse(text, {std::move(views), {{"gap", 12}}});
         ASSERT_FALSE(result.error) << result.error->message;
