@@ -24,10 +24,11 @@ public:
     bool isEnabled() const { return _enabled; }
     void setEnabled(bool enabled);
 
-    /// Asked at every press, before the alert closes; false keeps it open and the handler is not called.
+    /// The function is asked at every press, before the alert closes. When it answers false, the alert stays
+    /// open and the handler is not called.
     void setShouldClose(std::function<bool()> shouldClose) { _shouldClose = std::move(shouldClose); }
 
-    // For the alert that holds the action.
+    // The alert that holds the action calls these.
     bool mayClose() const { return !_shouldClose || _shouldClose(); }
     void run();
     void setOnChange(std::function<void()> onChange) { _onChange = std::move(onChange); }

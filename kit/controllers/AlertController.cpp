@@ -123,7 +123,7 @@ bool AlertController::press(std::size_t actionIndex)
 
 bool AlertController::press(const std::shared_ptr<AlertAction>& pressed)
 {
-    // Whoever is asked may let the alert go.
+    // The functions that are asked here belong to the caller and may release the alert.
     const auto self = std::static_pointer_cast<AlertController>(shared_from_this());
     const auto action = pressed;
     const bool isKnown = std::find(_actions.begin(), _actions.end(), action) != _actions.end();

@@ -11,10 +11,11 @@ namespace kit {
 class AlertController;
 class TextField;
 
-/// Alert: centred in the window. ActionSheet: at its bottom, or a popover where there is room.
+/// An Alert stands in the centre of the window. An ActionSheet stands at its bottom, or is a popover where
+/// there is room.
 enum class AlertStyle { ActionSheet, Alert };
 
-/// Call down: texts, actions or fields of the alert have changed.
+/// Calls down: the texts, the actions or the fields of the alert have changed.
 class AlertObserver {
 public:
     virtual ~AlertObserver() = default;
@@ -35,26 +36,28 @@ public:
 
     const std::vector<std::shared_ptr<AlertAction>>& actions() const { return _actions; }
     void addAction(const std::shared_ptr<AlertAction>& action);
-    /// What the return key presses; null: none.
+    /// Answers the action that the return key presses, or null when it presses none.
     std::shared_ptr<AlertAction> preferredAction() const { return _preferredAction; }
     void setPreferredAction(std::shared_ptr<AlertAction> action);
-    /// What Escape and a tap beside the alert press: the one that was set, else the action in the cancel
-    /// style, else the only action; null: nothing.
+    /// Answers the action that Escape and a tap beside the alert press: the one that was set, else the action
+    /// in the cancel style, else the only action, else null.
     std::shared_ptr<AlertAction> escapeAction() const;
     void setEscapeAction(std::shared_ptr<AlertAction> action);
 
     const std::vector<std::shared_ptr<TextField>>& textFields() const { return _textFields; }
     /// `configure` is called at once with the new field.
     void addTextField(const std::function<void(TextField&)>& configure);
-    /// Shown between the message and the fields' end; hidden while its view is hidden.
+    /// The view of this screen is shown between the message and the fields. It takes no room while it is
+    /// hidden.
     std::shared_ptr<ViewController> contentViewController() const { return _content; }
     void setContentViewController(const std::shared_ptr<ViewController>& content);
 
-    // Events up.
-    /// The user pressed an action. False when it is disabled, unknown, or refused to close.
+    // Events up: the host reports what the user did.
+    /// The user pressed an action. Answers false when the action is disabled, is not one of this alert's, or
+    /// refused to close.
     bool press(std::size_t actionIndex);
     bool press(const std::shared_ptr<AlertAction>& action);
-    /// Escape or a tap beside the alert.
+    /// The user pressed Escape or tapped beside the alert.
     void userCancelled() override;
 
     void loadView() override;

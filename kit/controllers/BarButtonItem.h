@@ -18,11 +18,10 @@ namespace kit {
 class BarButtonItem;
 class View;
 
-/// The platform's standard symbols and spaces. `Plain` is an item with a title, an image or a view of its
-/// own.
+/// The platform's standard symbols and spaces. A `Plain` item has a title, an image or a view of its own.
 enum class SystemItem { Plain, Cancel, Done, Action, Trash, Organize, Search, FlexibleSpace, FixedSpace };
 
-/// Call down: what the item shows, or whether it is enabled, has changed.
+/// Calls down: the item shows something else, or became enabled or disabled.
 class BarButtonItemObserver {
 public:
     virtual ~BarButtonItemObserver() = default;
@@ -46,22 +45,23 @@ public:
     const std::string& title() const { return _title; }
     void setTitle(std::string title);
     const std::optional<Image>& image() const { return _image; }
-    /// Stands for the title in a bar that is narrow, so that the screen's own title has room.
+    /// A narrow bar shows this image in place of the title, so that the screen's own title has room.
     const std::optional<Image>& compactImage() const { return _compactImage; }
     void setCompactImage(Image image);
     const std::shared_ptr<View>& customView() const { return _customView; }
-    /// Never empty for an item that can be pressed: a standard symbol has its standard name.
+    /// The label is never empty for an item that can be pressed, because a standard symbol has its standard
+    /// name.
     const std::string& accessibilityLabel() const { return _accessibilityLabel; }
     void setAccessibilityLabel(std::string label);
     double width() const { return _width; } ///< of a fixed space, points
     void setWidth(double points);
 
-    /// With a custom view, the view's own state.
+    /// An item with a custom view is enabled when that view is.
     bool isEnabled() const;
     void setEnabled(bool enabled);
     void setAction(Action action) { _action = std::move(action); }
 
-    /// Event up: the user pressed it. False when it is disabled, and nothing happens then.
+    /// Event up: the user pressed the item. Answers false, and does nothing, when the item is disabled.
     bool press();
 
 private:

@@ -26,7 +26,8 @@ void decodeInterfaceState(ViewController& root, const PropertyDictionary& state)
         root.restorationIdentifier().empty() ? nullptr : find(state, root.restorationIdentifier());
     if (const auto* values = kept ? kept->get<PropertyDictionary>() : nullptr)
         root.decodeRestorableStateWithCoder(StateCoder(*values));
-    // A screen may give itself other children while it takes its state back.
+    // The list of children is copied, because a screen may give itself other children while it takes its
+    // state back.
     const auto children = root.children();
     for (const auto& child : children)
         decodeInterfaceState(*child, state);

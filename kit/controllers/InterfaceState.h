@@ -10,10 +10,11 @@ namespace kit {
 
 class ViewController;
 
-/// The state of a screen and of the screens that it contains: one dictionary for each restoration identifier.
+/// Answers the state of a screen and of the screens that it contains, with one dictionary for each
+/// restoration identifier.
 PropertyDictionary encodeInterfaceState(ViewController& root);
-/// Gives every screen in the tree that has a restoration identifier its dictionary back, parents first.
-/// Screens without a kept state are not called.
+/// Gives every screen in the tree that has a restoration identifier its dictionary back, parents first. It
+/// does not call screens that have no kept state.
 void decodeInterfaceState(ViewController& root, const PropertyDictionary& state);
 
 } // namespace kit

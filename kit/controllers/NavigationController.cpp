@@ -81,13 +81,14 @@ void NavigationController::setViewControllers(Screens screens, bool animated)
     std::erase(screens, nullptr);
     if (screens == before)
         return;
-    // A new top that was in the stack before is gone back to.
+    // When the new top was in the stack before, the movement is one back to it.
     const bool goesBack =
         !screens.empty() && std::find(before.begin(), before.end(), screens.back()) != before.end();
     replaceStack(std::move(screens), goesBack ? NavigationKind::Pop : NavigationKind::Replace, animated);
 }
 
-/// Changes who is whose child; a screen that is seen to go keeps its parent until it is gone.
+/// Changes the children and their parents. A screen that the user sees leaving keeps its parent until the
+/// movement ends.
 void NavigationController::adopt(Screens screens, const std::shared_ptr<ViewController>& leaving)
 {
     const auto before = std::exchange(_children, std::move(screens));
@@ -159,12 +160,12 @@ void NavigationController::endTransition(const NavigationTransition& transition)
         return;
     to->endAppearance();
     to->didMoveToParentViewController(shared_from_this());
-    // The screen may have gone on to another one while it was told.
+    // The screen may have shown another one from within the callback above.
     if (to == topViewController())
         tellDidShow(to, animated);
 }
 
-/// The view of the top screen lies in front; one that goes is removed when it is gone.
+/// Puts the view of the top screen in front. A leaving screen's view is removed at the end of the movement.
 void NavigationController::showTopView()
 {
     const auto top = topViewController();

@@ -11,15 +11,16 @@
 
 namespace kit {
 
-/// How much of a screen lies under the bars. Both are zero where the host keeps screens between the bars.
+/// Says how much of a screen lies under the bars. Both are zero where the host keeps screens between the
+/// bars.
 struct BarFrames {
     Rect navigationBar, toolbar;
     bool operator==(const BarFrames&) const = default;
 };
 
 /// A stack of screens of which the top one is shown, with a navigation bar above and a toolbar below. Every
-/// change takes place in the model at once; appearance callbacks and the delegate's did-show follow the
-/// movement when a host shows one, and come at once otherwise.
+/// change takes place in the model at once. The appearance callbacks and the delegate's did-show call come at
+/// the end of the movement when a host shows one, else at once.
 class NavigationController : public ViewController {
 public:
     void accept(ViewControllerVisitor& visitor) override;
@@ -31,11 +32,11 @@ public:
 
     const std::vector<std::shared_ptr<ViewController>>& viewControllers() const { return children(); }
     std::shared_ptr<ViewController> topViewController() const; ///< null: empty stack
-    /// The topmost presented screen, else the top one.
+    /// Answers the topmost presented screen, else the top one.
     std::shared_ptr<ViewController> visibleViewController() const;
 
     void pushViewController(const std::shared_ptr<ViewController>& screen, bool animated);
-    /// The screen that was taken off; null when only one is left.
+    /// Answers the screen that was taken off, or null when only one is left.
     std::shared_ptr<ViewController> popViewController(bool animated);
     std::vector<std::shared_ptr<ViewController>> popToRootViewController(bool animated);
     void setViewControllers(std::vector<std::shared_ptr<ViewController>> screens, bool animated);
@@ -45,22 +46,23 @@ public:
 
     const BarFrames& barFrames() const { return _barFrames; }
     bool isTransitioning() const { return !_transition.isFinished(); }
-    /// Ends a movement that is still shown; its callbacks come at once.
+    /// Ends a movement that is still being shown, and calls its callbacks at once.
     void completeTransition() { _transition.finish(); }
-    /// Whether the back button, a swipe or a key may go back now.
+    /// Answers whether the back button, a swipe or a key may go back now.
     bool canGoBack() const;
 
-    // Events up.
-    /// The user went back (back button, swipe, key). False: there is nothing to go back to. The host may show
-    /// the other screen already (a swipe); its observer is told all the same.
+    // Events up: the host reports what the user did.
+    /// The user went back by the back button, a swipe or a key. Answers false when there is nothing to go
+    /// back to. The host may show the other screen already, as after a swipe; its observer is told all the
+    /// same.
     bool userWentBack(bool animated = true);
-    /// The host gave the area of a screen this size. Without a host a screen fills the controller's view.
+    /// The host gave a screen's area this size. Without a host a screen fills the controller's view.
     void screenResized(ViewController& screen, Size size);
     void barsResized(const BarFrames& frames);
 
     bool backRequested() override;
 
-    // Overriders call these.
+    // Classes that override these call them.
     void viewWillLayoutSubviews() override;
     std::vector<std::shared_ptr<ViewController>> appearingChildren() const override;
     void viewWillAppear(bool animated) override;
@@ -81,7 +83,7 @@ private:
     std::weak_ptr<NavigationControllerDelegate> _delegate;
     ObserverSlot<NavigationObserver> _navigationObserver;
     TransitionToken _transition;
-    std::weak_ptr<ViewController> _announced; ///< the screen that the delegate was told of last
+    std::weak_ptr<ViewController> _announced; ///< the last screen that the delegate was told of
     BarFrames _barFrames;
     bool _toolbarHidden = true, _hostSizesScreens = false;
 };

@@ -19,7 +19,7 @@ public:
         NavigationController&, const std::shared_ptr<ViewController>& /*screen*/, bool /*animated*/)
     {
     }
-    /// After the movement, also of a screen that the user went back to.
+    /// Called after the movement, also when the user went back.
     virtual void navigationControllerDidShowViewControllerAnimated(
         NavigationController&, const std::shared_ptr<ViewController>& /*screen*/, bool /*animated*/)
     {

@@ -10,7 +10,7 @@
 
 namespace kit {
 
-/// What a screen shows in the navigation bar while it is on top.
+/// The title, the buttons and the menu that the navigation bar shows while a screen is on top.
 class NavigationItem {
 public:
     /// `onChange` is called after every change.
@@ -23,26 +23,27 @@ public:
 
     const BarButtonItems& leftItems() const { return _leftItems; }
     void setLeftItems(BarButtonItems items);
-    /// The first one stands at the right edge, the others go on to the left.
+    /// The first item stands at the right edge, and each further one stands to the left of the one before.
     const BarButtonItems& rightItems() const { return _rightItems; }
     void setRightItems(BarButtonItems items);
     void setRightItem(std::shared_ptr<BarButtonItem> item); ///< null: none
 
     bool hidesBackButton() const { return _hidesBackButton; }
     void setHidesBackButton(bool hides);
-    /// Whether left items stand beside the back button instead of replacing it.
+    /// Answers whether left items stand beside the back button instead of replacing it.
     bool leftItemsSupplementBackButton() const { return _leftItemsSupplementBackButton; }
     void setLeftItemsSupplementBackButton(bool supplement);
 
-    /// What the bar's search button does; absent: no such button.
+    /// The bar's search button calls this function; without one the bar has no such button.
     const std::function<void()>& searchAction() const { return _searchAction; }
     void setSearchAction(std::function<void()> action);
 
-    /// What the key for something new does (Ctrl+Shift+N); absent: nothing.
+    /// The key for a new item (Ctrl+Shift+N) calls this function; without one the key does nothing.
     const std::function<void()>& newAction() const { return _newAction; }
     void setNewAction(std::function<void()> action);
 
-    /// The menu of the bar's menu button, asked for when it is pressed; absent: no such button.
+    /// The bar's menu button calls this function at each press and shows its menu; without one the bar has no
+    /// such button.
     using MenuMaker = std::function<Menu()>;
     const MenuMaker& menu() const { return _menu; }
     const std::string& menuName() const { return _menuName; }

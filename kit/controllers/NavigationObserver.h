@@ -22,13 +22,13 @@ struct NavigationTransition {
     bool animated;
 };
 
-/// Calls down that only a navigation controller makes. The stack has changed already.
+/// Calls down that only a navigation controller makes. The stack has already changed when they come.
 class NavigationObserver {
 public:
     virtual ~NavigationObserver() = default;
 
-    /// Show the other screen; finish the token when it stands. A transition that was not finished when the
-    /// next one begins counts as finished.
+    /// The observer shows the other screen and finishes the token when the movement has ended. A transition
+    /// that is not finished when the next one begins counts as finished.
     virtual void navigationWillTransition(
         NavigationController& controller, const NavigationTransition& transition, TransitionToken token) = 0;
     /// The stack changed below the screen on top.

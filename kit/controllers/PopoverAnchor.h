@@ -32,7 +32,7 @@ struct ViewAnchor {
     ArrowDirections arrows = ArrowDirections::Any;
 };
 
-/// What a popover points at: nothing, a rectangle of a view, or an entry of a bar.
+/// A popover points at nothing, at a rectangle of a view, or at an item of a bar.
 using PopoverAnchor = std::variant<std::monostate, ViewAnchor, std::weak_ptr<BarButtonItem>>;
 
 } // namespace kit

@@ -9,8 +9,8 @@ namespace kit {
 
 class ViewController;
 
-/// How a presented screen lies over the one below, with the platform's numbers. Only FullScreen makes the
-/// screen below disappear.
+/// Says how a presented screen lies over the one below, with the platform's numbers. Only FullScreen makes
+/// the screen below disappear.
 enum class PresentationStyle { FullScreen = 0, PageSheet = 1, OverCurrentContext = 6, Popover = 7 };
 
 /// One screen over another.

@@ -13,15 +13,17 @@ class SearchPresentation;
 class SearchPresentationDelegate {
 public:
     virtual ~SearchPresentationDelegate() = default;
-    /// After every edit.
+    /// Called after every edit.
     virtual void searchQueryDidChange(SearchPresentation& search) = 0;
     /// The user left the search; it is dismissed already.
     virtual void searchWasCancelled(SearchPresentation&) { }
-    /// The keyboard goes down from the field into the results, which may still be on their way.
+    /// The user moved the keyboard focus from the field down into the results, which may not have arrived
+    /// yet.
     virtual void searchResultsWanted(SearchPresentation&) { }
-    /// The return key in the field, or before the results that it was meant for.
+    /// The user pressed the return key in the field. The results that the key was meant for may not have
+    /// arrived yet.
     virtual void searchResultChosen(SearchPresentation&) { }
-    /// The search is not shown any more, for whatever reason.
+    /// The search is no longer shown. This comes however the search ended.
     virtual void searchDidDisappear(SearchPresentation&) { }
 };
 
@@ -33,8 +35,8 @@ public:
     virtual void searchWantsFocus(SearchPresentation& search, bool focus) = 0;
 };
 
-/// The search field with its results: presented over a list, its view shows the results below the field. A
-/// presented screen is a search exactly when it is of this class.
+/// A screen with a search field. It is presented over a list, and its view shows the results below the field.
+/// The host recognises a search by this class.
 class SearchPresentation : public ViewController {
 public:
     SearchPresentation();
@@ -53,7 +55,7 @@ public:
     bool hasFocus() const { return _focus; }
     void setFocus(bool focus);
 
-    // Events up.
+    // Events up: the host reports what the user did.
     void userEditedQuery(std::string query);
     void userWentDown();
     void userPressedReturn();

@@ -10,7 +10,7 @@
 
 namespace kit {
 
-/// The outermost screen around this one: what it presents lies over all of it.
+/// Answers the outermost screen around this one, because a presented screen lies over all of it.
 std::shared_ptr<ViewController> ViewController::presentationRoot() const
 {
     auto root = std::const_pointer_cast<ViewController>(shared_from_this());
@@ -19,7 +19,8 @@ std::shared_ptr<ViewController> ViewController::presentationRoot() const
     return root;
 }
 
-/// What waits for the end of a movement comes before the next change of the model.
+/// Ends a movement that is still being shown, because its callbacks have to run before the model changes
+/// again.
 void ViewController::finishTransition() const
 {
     const auto root = presentationRoot();

@@ -143,7 +143,7 @@ void ViewController::beginAppearance(bool appearing, bool animated)
         : _appearance == AppearanceState::Disappeared || _appearance == AppearanceState::Disappearing;
     if (isUnderWay)
         return;
-    // A screen that is being loaded does not appear yet.
+    // The view is loaded first, so that a screen is not marked as appearing while it is being loaded.
     view();
     _appearance = appearing ? AppearanceState::Appearing : AppearanceState::Disappearing;
     _animatedAppearance = animated;

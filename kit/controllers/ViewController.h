@@ -30,7 +30,7 @@ class Window;
 
 enum class AppearanceState { Disappeared, Appearing, Appeared, Disappearing };
 
-/// One screen: a view that is made on first demand, what surrounds it, and the screens that it contains or
+/// One screen: a view that is made on first demand, the bars around it, and the screens that it contains or
 /// presents. Made with std::make_shared. Main thread only.
 class ViewController : public ViewOwner, public std::enable_shared_from_this<ViewController> {
 public:
@@ -50,7 +50,8 @@ public:
     virtual void loadView(); ///< the default makes an empty view
     virtual void viewDidLoad() { }
 
-    // Called once for each appearance, in this order; an appearance may be broken off.
+    // These are called once for each appearance, in this order. A disappearance may begin before the
+    // appearance has ended.
     virtual void viewWillAppear(bool /*animated*/) { }
     virtual void viewDidAppear(bool /*animated*/) { }
     virtual void viewWillDisappear(bool /*animated*/) { }
@@ -71,7 +72,7 @@ public:
     const BarButtonItems& toolbarItems() const { return _toolbarItems; }
     void setToolbarItems(BarButtonItems items);
 
-    // Containment: add the child, then its view, then tell the child.
+    // A container adds the child first, then the child's view, then tells the child.
     std::shared_ptr<ViewController> parent() const { return _parent.lock(); }
     const std::vector<std::shared_ptr<ViewController>>& children() const { return _children; }
     void addChildViewController(const std::shared_ptr<ViewController>& child);
@@ -80,25 +81,25 @@ public:
     std::shared_ptr<NavigationController>
     navigationController() const; ///< the nearest one around this screen
 
-    /// Shows a screen over this one, or over what already lies over it. The completion runs when the screen
-    /// is in place.
+    /// Shows a screen over this one and over everything that it presents already. The completion runs once,
+    /// when the screen is in place.
     void presentViewController(const std::shared_ptr<ViewController>& presented, bool animated,
         std::function<void()> completion = {});
-    /// Takes away everything that this screen presents; without such, itself when it is presented. The
-    /// completion runs once at the end, also when there was nothing to dismiss.
+    /// Dismisses every screen that this screen presents. When it presents none, it dismisses itself if it is
+    /// presented. The completion runs once at the end, also when there was nothing to dismiss.
     void dismissViewController(bool animated, std::function<void()> completion = {});
-    /// The screen presented by this one or by a screen that contains it; null: none.
+    /// Answers the screen that is presented by this one or by a screen that contains it, or null.
     std::shared_ptr<ViewController> presentedViewController() const;
     std::shared_ptr<ViewController> presentingViewController() const;
     PresentationStyle presentationStyle() const { return _presentationStyle; }
     void setPresentationStyle(PresentationStyle style) { _presentationStyle = style; }
     const PopoverAnchor& popoverAnchor() const { return _popoverAnchor; }
     void setPopoverAnchor(PopoverAnchor anchor) { _popoverAnchor = std::move(anchor); }
-    /// Event up: the user asks to leave this presented screen (Escape, a tap beside it). The default
+    /// Event up: the user asks to leave this presented screen by Escape or by a tap beside it. The default
     /// dismisses it.
     virtual void userCancelled();
     /// Event up: the user asks to go back within this screen. The default presses the Cancel button of the
-    /// navigation bar. False: there is nothing to go back to.
+    /// navigation bar. Answers false when there is nothing to go back to.
     virtual bool backRequested();
 
     const std::string& restorationIdentifier() const
@@ -109,10 +110,10 @@ public:
     virtual void encodeRestorableStateWithCoder(StateCoder&) { }
     virtual void decodeRestorableStateWithCoder(const StateCoder&) { }
 
-    // For containers and windows: an appearance begins, and ends.
+    // Containers and windows call these when an appearance begins and ends.
     void beginAppearance(bool appearing, bool animated);
     void endAppearance();
-    /// The contained screens that appear along with this one.
+    /// Answers the contained screens that appear along with this one.
     virtual std::vector<std::shared_ptr<ViewController>> appearingChildren() const { return _children; }
 
 protected:

@@ -7,11 +7,12 @@ namespace kit {
 
 class ViewController;
 
-/// Call down: what surrounds a screen has changed.
+/// Calls down: the bars around a screen have changed.
 class ViewControllerObserver {
 public:
     virtual ~ViewControllerObserver() = default;
-    /// The title, the navigation item or the toolbar items. May come several times for one change.
+    /// The title, the navigation item or the toolbar items changed. This may come several times for one
+    /// change.
     virtual void barsDidChange(ViewController& controller) = 0;
 };
 

@@ -10,7 +10,7 @@ class NavigationController;
 class SearchPresentation;
 class ViewController;
 
-/// Tells the kinds of screen apart without casts.
+/// Tells the classes of screens apart without casts.
 class ViewControllerVisitor {
 public:
     virtual ~ViewControllerVisitor() = default;

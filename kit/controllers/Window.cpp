@@ -14,7 +14,7 @@ namespace kit {
 
 namespace {
 
-/// Whether a screen hides the one below it altogether.
+/// Answers whether a screen hides the one below it altogether.
 bool covers(const Presentation& presentation)
 {
     return presentation.presented->presentationStyle() == PresentationStyle::FullScreen;
@@ -42,8 +42,8 @@ InterfaceOrientation Window::interfaceOrientation() const
                                           : InterfaceOrientation::Portrait;
 }
 
-/// Screens stand in the window from the moment they are shown; a host gives sheets and alerts their real
-/// size.
+/// Adds the screen's view to the window. The view fills the window at first, because only a host knows the
+/// real size of sheets and alerts.
 void Window::attach(ViewController& screen)
 {
     const auto& view = screen.view();

@@ -38,30 +38,30 @@ public:
 
     const std::shared_ptr<ViewController>& rootViewController() const { return _root; }
     void setRootViewController(std::shared_ptr<ViewController> root);
-    /// Shows the window through the installed host, if any; the root screen appears.
+    /// Shows the window through the installed host, if there is one, and makes the root screen appear.
     void makeKeyAndVisible();
     bool isVisible() const { return _visible; }
     bool isKey() const { return _key; }
 
-    /// The screens over the root, the topmost last.
+    /// Answers the screens over the root, the topmost last.
     std::vector<std::shared_ptr<ViewController>> presentedScreens() const;
     void layoutIfNeeded();
 
-    // Events up.
+    // Events up: the host reports what happened to the window.
     void resized(Size size, const TraitCollection& traits);
     void becameKey(bool key) { _key = key; }
-    /// The user asks to go back (Escape, Alt+Left, the back gesture): the topmost presented screen is
-    /// cancelled, else the Cancel button of the bar is pressed, else the navigation goes back. False: nothing
-    /// to go back to.
+    /// The user asks to go back by Escape, Alt+Left or the back gesture. The topmost presented screen is
+    /// cancelled; else the Cancel button of the bar is pressed; else the navigation goes back. Answers false
+    /// when there is nothing to go back to.
     bool backRequested();
-    /// The window was closed: its screens disappear.
+    /// The window was closed, so its screens disappear.
     void closed();
 
-    // For view controllers.
+    // View controllers call these.
     void finishTransition() { _transition.finish(); }
     void present(const Presentation& presentation, std::function<void()> completion);
-    /// The screens have been taken off the model, the topmost comes last; the first one was presented by
-    /// `presenting`.
+    /// The model has already lost these screens, of which the topmost comes last. `presenting` presented the
+    /// first one.
     void dismiss(std::vector<Presentation> presentations, std::function<void()> completion);
 
 private:

@@ -14,7 +14,8 @@ class WindowHost {
 public:
     virtual ~WindowHost() = default;
 
-    /// A window wants to be seen: make a peer for it, attach it with `Window::setObserver`, report the size.
+    /// Shows a window: the host makes a peer for it, attaches the peer with `Window::setObserver` and reports
+    /// the size.
     virtual void showWindow(const std::shared_ptr<Window>& window) = 0;
 
     static std::shared_ptr<WindowHost> current();

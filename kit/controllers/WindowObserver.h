@@ -10,16 +10,16 @@ namespace kit {
 
 class Window;
 
-/// Calls down that a window makes to the host that shows it. The model has changed already.
+/// Calls down that a window makes to the host that shows it. The model has already changed when they come.
 class WindowObserver {
 public:
     virtual ~WindowObserver() = default;
 
     virtual void rootDidChange(Window& window) = 0;
-    /// Show the screen over the others; finish the token when it stands.
+    /// The host shows the screen over the others and finishes the token when the screen is in place.
     virtual void windowWillPresent(
         Window& window, const Presentation& presentation, TransitionToken token) = 0;
-    /// Take the screen away; finish the token when it is gone.
+    /// The host takes the screen away and finishes the token when it is gone.
     virtual void windowWillDismiss(
         Window& window, const Presentation& presentation, TransitionToken token) = 0;
 };

@@ -28,7 +28,8 @@ enum class LayoutAttribute {
 
 enum class LayoutRelation { LessThanOrEqual, Equal, GreaterThanOrEqual };
 
-/// Priorities of constraints, 1 to 1000. A higher one is satisfied before any lower one is looked at.
+/// Priorities of constraints, 1 to 1000. A constraint is never missed for the sake of one with a lower
+/// priority.
 using LayoutPriority = float;
 
 namespace LayoutPriorities {
@@ -41,7 +42,7 @@ inline constexpr LayoutPriority fittingSize =
 
 } // namespace LayoutPriorities
 
-/// One edge, centre line, dimension or baseline of a view. Its builders answer a new constraint that is not
+/// One edge, centre line, dimension or baseline of an item. Its builders answer a new constraint that is not
 /// active yet: this anchor = (other anchor * multiplier) + constant.
 class LayoutAnchor {
 public:
@@ -57,7 +58,7 @@ public:
     Made lessThanOrEqualTo(const LayoutAnchor& other, double constant = 0, double multiplier = 1) const;
     Made greaterThanOrEqualTo(const LayoutAnchor& other, double constant = 0, double multiplier = 1) const;
 
-    /// For widths and heights: a plain number of points.
+    /// Anchors of widths and heights take a plain number of points.
     Made equalToConstant(double constant) const;
     Made lessThanOrEqualToConstant(double constant) const;
     Made greaterThanOrEqualToConstant(double constant) const;

@@ -11,13 +11,14 @@
 
 namespace kit {
 
-/// The relation: first = second * multiplier + constant (or <=, or >=). An active constraint is kept alive by
-/// the view of its first anchor and takes part in the layout while both views stand in one tree; it ends with
-/// either view. Taking a view out of a tree deactivates the constraints between it and what stays behind.
-/// Main thread only.
+/// A relation: first = second * multiplier + constant (or <=, or >=). The item of its first anchor keeps an
+/// active constraint alive. The constraint takes part in the layout while both items stand in one tree, and
+/// ends when either item is destroyed. Taking an item out of a tree deactivates the constraints between it
+/// and the rest of the tree. Main thread only.
 class LayoutConstraint : public std::enable_shared_from_this<LayoutConstraint> {
 public:
-    /// Without a second anchor (`LayoutAnchor()`), the relation is to the constant alone.
+    /// Without a second anchor (`LayoutAnchor()`), the constraint compares the first anchor with the constant
+    /// alone.
     LayoutConstraint(LayoutAnchor first, LayoutRelation relation, LayoutAnchor second, double multiplier = 1,
         double constant = 0);
 
@@ -27,22 +28,23 @@ public:
     double multiplier() const { return _multiplier; }
 
     double constant() const { return _constant; }
-    /// Cheap, also while active: the layout is adjusted, not built again.
+    /// This is cheap, also for an active constraint, because the layout is adjusted and not built again.
     void setConstant(double constant);
 
     LayoutPriority priority() const { return _priority; }
-    /// Kept within 1 to 1000; 1000 is required.
+    /// The priority is kept within 1 to 1000; 1000 means required.
     void setPriority(LayoutPriority priority);
-    /// The same, to go on with the constraint: `a.equalTo(b)->withPriority(999)`.
+    /// Sets the priority and answers the constraint itself, for chains such as
+    /// `a.equalTo(b)->withPriority(999)`.
     std::shared_ptr<LayoutConstraint> withPriority(LayoutPriority priority);
 
     bool isActive() const { return _active; }
-    /// False, and a line in the log, when the first view is gone.
+    /// Answers false, and logs a line, when the first item is gone.
     bool setActive(bool active);
 
     const std::string& identifier() const { return _identifier; }
     void setIdentifier(std::string identifier) { _identifier = std::move(identifier); }
-    /// The constraint in words, for the log.
+    /// Answers the constraint in words, for the log.
     std::string description() const;
 
     static void activate(const std::vector<std::shared_ptr<LayoutConstraint>>& constraints);

@@ -15,23 +15,24 @@ namespace kit {
 
 namespace {
 
-// A layout settles in two or three passes; the bounds only end items whose answers go round in circles.
+// A layout settles in two or three passes. The bounds end a layout whose items keep changing their answers.
 constexpr int maximumPasses = 12;
 constexpr int maximumWrapRounds = 4;
 
-// No length is negative, but a window that is too small is no reason to give up what was asked for.
+// No length is negative. This is not required, because a window that is too small must not make the solver
+// give up the constraints that were asked for.
 constexpr LayoutPriority noNegativeLength = 999.5F;
-// A wanted length whose priority says that it is required.
+// The priority of a wanted length that asks to be required.
 constexpr LayoutPriority requiredWish = 999.9F;
-// How strongly a fitting size is kept that was asked for.
+// The priority with which a requested side of a fitting size is kept.
 constexpr LayoutPriority targetSize = 999;
-// Smaller differences of lengths are rounding errors.
+// Smaller differences between lengths are rounding errors.
 constexpr double tolerance = 1e-6;
 
 using ConstraintId = LayoutSolver::ConstraintId;
 using Term = LayoutSolver::Term;
 
-/// The wanted length of a item on one axis as it stands in the solver.
+/// The wanted length of an item on one axis, as the solver knows it.
 struct Wish {
     double wanted = LayoutItem::noIntrinsicMetric;
     LayoutPriority hugging = 0, resistance = 0;
@@ -41,7 +42,7 @@ struct Wish {
 struct PlacedItem {
     std::weak_ptr<LayoutItem> item;
     std::array<Wish, 2> wishes;
-    double wrappedAt = -1; ///< the width for which the wanted height was asked last
+    double wrappedAt = -1; ///< the width for which the wanted height was last asked
     bool wishesAreStale = true;
 };
 
@@ -49,9 +50,9 @@ struct ActiveRule {
     std::weak_ptr<const LayoutConstraint> constraint;
     LayoutRule rule;
     LayoutPriority priority = 0;
-    std::optional<ConstraintId> id; ///< nothing: given up
+    std::optional<ConstraintId> id; ///< absent: the constraint was given up
     std::uint64_t seen = 0;
-    bool isReported = false; ///< that it was given up
+    bool isReported = false; ///< whether the log says that it was given up
 };
 
 struct Addition {
@@ -75,8 +76,9 @@ struct LayoutEngine::Impl {
     LayoutTranslation translation;
     std::unordered_map<const LayoutItem*, PlacedItem> placed;
     std::unordered_map<const LayoutConstraint*, ActiveRule> rules;
-    std::vector<std::shared_ptr<LayoutItem>> tree; ///< as of the last synchronisation, parents first
-    std::vector<std::shared_ptr<LayoutItem>> inner; ///< roots of layouts of their own in this tree
+    std::vector<std::shared_ptr<LayoutItem>>
+        tree; ///< the items as of the last synchronisation, parents first
+    std::vector<std::shared_ptr<LayoutItem>> inner; ///< the roots of separate layouts within this tree
     std::vector<Addition> additions;
     std::uint64_t generation = 0;
     bool structureIsStale = true, wishesAreStale = true, isRunning = false, isFitting = false;
@@ -118,8 +120,8 @@ void LayoutEngine::Impl::updateConstraints(LayoutItem& item)
 
 void LayoutEngine::Impl::collect(const std::shared_ptr<LayoutItem>& item)
 {
-    // The root owns this engine, but for one that is made for a fitting size alone: to hold the root from
-    // here would keep both for ever.
+    // The root owns this engine, so the engine must not hold the root or neither would ever be destroyed. An
+    // engine made for one fitting size is owned by nobody and may hold it.
     const bool isOwner = item.get() == &root && !isFitting;
     tree.push_back(isOwner ? std::shared_ptr<LayoutItem>(std::shared_ptr<void>(), &root) : item);
     for (const auto& child : item->layoutChildren()) {
@@ -144,7 +146,8 @@ void LayoutEngine::Impl::synchronize()
         removeGoneItems();
         wishesAreStale = true;
     }
-    // Before the wishes: most of them then find a length that is still free.
+    // Constraints are added before the wanted lengths, because most wanted lengths then find a variable that
+    // is still free.
     addAll();
     if (wishesAreStale) {
         for (const auto& item : tree) {
@@ -163,8 +166,8 @@ void LayoutEngine::Impl::placeItems()
         if (const auto found = placed.find(item.get()); found != placed.end()) {
             if (found->second.item.lock() == item)
                 continue;
-            // Another item has come to stand at the address of one that is gone; nothing of the old one
-            // holds.
+            // Another item was created at the address of a destroyed one, so nothing that is known of the old
+            // item holds.
             found->second = {item, found->second.wishes, -1, true};
             continue;
         }
@@ -259,7 +262,8 @@ void LayoutEngine::Impl::updateWish(
     const bool isKept = wish.hugging == hugging && wish.resistance == resistance;
     wish.hugging = hugging;
     wish.resistance = resistance;
-    // Of what resists being short nothing more has to be said.
+    // An item that resists being shorter than its content, whose length is positive, needs no constraint
+    // against negative lengths.
     const bool isWanted = wish.wanted >= 0 && (hugging > 0 || resistance > 0);
     if (isWanted && resistance > 0) {
         remove(wish.notNegative);
@@ -271,7 +275,7 @@ void LayoutEngine::Impl::updateWish(
         return;
     }
     remove(wish.id);
-    // A wish that is required would be in the way of what was asked for in so many words.
+    // The wish stays below required, because a required wish could contradict an explicit constraint.
     const auto atMost = [](LayoutPriority priority) { return std::min(priority, requiredWish); };
     if (isWanted)
         wish.id = solver.addWish(length, wish.wanted, atMost(hugging), atMost(resistance));
@@ -287,7 +291,8 @@ void LayoutEngine::Impl::remove(std::optional<ConstraintId>& id)
 void LayoutEngine::Impl::addAll()
 {
     static constexpr Operation op{"-[LayoutEngine addAll]"};
-    // The important ones first, so that most of the others find their optimum as they come.
+    // Constraints of high priority are added first, because most of the others then find their optimum at
+    // once.
     std::stable_sort(additions.begin(), additions.end(),
         [](const auto& a, const auto& b) { return a.priority > b.priority; });
     for (const auto& addition : additions) {
@@ -319,8 +324,8 @@ void LayoutEngine::Impl::solve()
     }
 }
 
-/// Asks items whose height depends on their width anew where the width has changed. True when a height is
-/// another.
+/// Asks items whose height depends on their width again where the width has changed. Answers whether a height
+/// changed.
 bool LayoutEngine::Impl::updateWrappedHeights()
 {
     bool isAnother = false;
@@ -362,7 +367,7 @@ void LayoutEngine::Impl::applyFrames()
 
 void LayoutEngine::Impl::layOutContents()
 {
-    // A item may change the tree while it lays out its subviews.
+    // The list is copied, because an item may change the tree while it lays out its subviews.
     const auto items = tree;
     for (const auto& item : items) {
         if (!item->_needsLayout)

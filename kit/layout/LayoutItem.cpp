@@ -101,7 +101,8 @@ void LayoutItem::setNeedsLayout()
     markTreeForLayout();
 }
 
-/// Lets every root above know that something below is stale; a root that knows already has told it.
+/// Tells every root above that something below it is stale. A root that already knows has told the roots
+/// above it.
 void LayoutItem::markTreeForLayout()
 {
     const auto parent = layoutParent();

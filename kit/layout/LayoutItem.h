@@ -18,7 +18,7 @@ class LayoutEngine;
 
 enum class Axis { Horizontal, Vertical };
 
-/// How the layout of the parent treats an item that is placed by its frame.
+/// Says how the layout of the parent treats an item that is placed by its frame.
 struct Autoresizing {
     bool flexibleWidth = false; ///< grows and shrinks with the parent
     bool flexibleHeight = false;
@@ -41,16 +41,16 @@ public:
     virtual const Rect& frame() const = 0;
     virtual void setFrame(const Rect& frame) = 0;
     virtual bool isRightToLeft() const = 0;
-    /// The name that the log gives the item.
+    /// The log calls the item by this name.
     const std::string& debugName() const { return _debugName; }
     void setDebugName(std::string name) { _debugName = std::move(name); }
 
     void setNeedsLayout();
     void layoutIfNeeded(); ///< lays out the whole tree that the item stands in, where it is stale
-    /// Makes the item the root of a layout of its own: constraints inside have nothing to do with items
+    /// Makes the item the root of a separate layout, so that no constraint joins an item inside with one
     /// outside.
     void setLayoutBoundary(bool boundary);
-    /// The smallest size that the constraints below allow; a positive target side is kept.
+    /// Answers the smallest size that the constraints below allow; a positive side of the target is kept.
     Size systemLayoutSizeFitting(Size target);
     static double roundToPixel(double points); ///< the nearest edge of a device pixel
 
@@ -68,17 +68,17 @@ public:
     LayoutAnchor firstBaselineAnchor() const { return anchor(LayoutAttribute::FirstBaseline); }
     LayoutAnchor lastBaselineAnchor() const { return anchor(LayoutAttribute::LastBaseline); }
 
-    /// True at first: the frame is the view's place. False: constraints place it. A stack view switches it
-    /// off for what it arranges.
+    /// At first this is true, and the frame gives the item's place. When it is false, constraints give the
+    /// place. A stack view switches it off for the views that it arranges.
     bool isPlacedByFrame() const { return _placedByFrame; }
     void setPlacedByFrame(bool placedByFrame);
     Autoresizing autoresizing() const { return _autoresizing; }
     void setAutoresizing(Autoresizing autoresizing) { _autoresizing = autoresizing; }
 
-    /// How strongly the view stays as small as its content; 0 or less: not at all.
+    /// Says how strongly the item stays as small as its content; at 0 or less it does not.
     LayoutPriority hugging(Axis axis) const { return _hugging[static_cast<std::size_t>(axis)]; }
     void setHugging(LayoutPriority priority, Axis axis);
-    /// How strongly it stays as large as its content.
+    /// Says how strongly the item stays as large as its content; at 0 or less it does not.
     LayoutPriority compressionResistance(Axis axis) const
     {
         return _resistance[static_cast<std::size_t>(axis)];
@@ -86,39 +86,40 @@ public:
     void setCompressionResistance(LayoutPriority priority, Axis axis);
 
     static constexpr double noIntrinsicMetric = -1;
-    /// The size that the content wants when it may be `maxWidth` wide (0: any width). A side without a wish
-    /// is `noIntrinsicMetric`.
+    /// Answers the size that the content wants when it may be `maxWidth` wide (0: any width). A side for
+    /// which it has no wish is `noIntrinsicMetric`.
     virtual Size intrinsicContentSize(double maxWidth = 0) const;
-    /// Whether the wanted height depends on the width.
+    /// Answers whether the wanted height depends on the width.
     virtual bool wrapsContent() const { return false; }
-    /// Where the first line stands below the top and the last line above the bottom.
+    /// Answers how far the first baseline lies below the top; the next one, how far the last baseline lies
+    /// above the bottom.
     virtual double firstBaselineOffset() const;
     virtual double lastBaselineOffset() const { return 0; }
-    /// The content wants another size now.
+    /// Call this when the content wants another size.
     virtual void invalidateIntrinsicContentSize();
 
-    /// The active constraints whose first anchor is on this view.
+    /// The active constraints whose first anchor is on this item.
     const LayoutConstraints& constraints() const { return _constraints; }
 
-    /// Called before the next layout after `setNeedsUpdateConstraints`.
+    /// Called once before the next layout after `setNeedsUpdateConstraints`.
     virtual void updateConstraints() { }
     void setNeedsUpdateConstraints();
 
 protected:
-    /// The item itself, kept alive by the answer.
+    /// Answers a reference that keeps the item itself alive.
     virtual std::shared_ptr<LayoutItem> layoutReference() = 0;
-    /// The item has its frame, and places what is inside it.
+    /// Called when the item has its frame, so that it can place its content.
     virtual void layOutContent() = 0;
-    /// The item is the root of a tree in which something became stale. Called once until the next layout.
+    /// Called on the root of a tree when something in it becomes stale, once until the next layout.
     virtual void layoutDidBecomeStale() = 0;
 
     void layoutInputDidChange(); ///< priorities, constraints, the tree or the kind of placement
     void directionDidChange();
-    /// The frame is another one already; a new size makes what is inside stale.
+    /// The item already has the new frame. A new size makes its content stale.
     void frameDidChange(bool isAnotherSize);
-    /// The item became a child: unless it is a boundary, the engine of another root lays it out from now on.
+    /// The item became a child. Unless it is a boundary, the engine of another root lays it out from now on.
     void didJoinLayout();
-    /// Ends the constraints in this tree between the items of a part of it and the items outside of that
+    /// Deactivates the constraints between the items inside a part of this tree and the items outside of that
     /// part.
     void deactivateConstraintsCrossing(const LayoutItem& part);
 

@@ -19,12 +19,13 @@ struct Stored {
     std::vector<LayoutSolver::Term> terms;
     LayoutRelation relation = LayoutRelation::Equal;
     double constant = 0;
-    // A required constraint is never missed; another one may be, upwards and downwards at these priorities. 0
-    // or less: as it likes.
+    // A required constraint always holds. Another one may be missed upwards and downwards at these
+    // priorities; 0 or less means that missing it costs nothing.
     bool isRequired = false;
     LayoutPriority againstMore = 0, againstLess = 0;
     bool inUse = false;
-    // The marker stands in this constraint's equation only; so does the second column, if there is one.
+    // The marker column stands in this constraint's equation only. So does the second column, if there is
+    // one.
     Column marker = 0;
     double markerCoefficient = 0;
     std::optional<Column> other;
@@ -57,8 +58,8 @@ struct LayoutSolver::Impl {
     void rebuild();
 };
 
-/// The constraint as an equation 0 = row. The slack of a required inequality is a column of its own; so are
-/// what another constraint has too much (the marker) and too little.
+/// Answers the constraint as an equation 0 = row. A required inequality gets one slack column. A constraint
+/// that may be missed gets a column for too much (the marker) and one for too little.
 SparseRow LayoutSolver::Impl::markedRow(Stored& constraint)
 {
     SparseRow row;
@@ -90,10 +91,10 @@ void LayoutSolver::Impl::addCosts(const Stored& constraint, double cost)
         tableau.addCost(*constraint.other, constraint.againstLess, cost);
 }
 
-/// A column that can be basic at once.
+/// Answers a column that can become basic at once.
 std::optional<Column> LayoutSolver::Impl::subject(const SparseRow& row, const Stored& constraint) const
 {
-    // The free column that stands in the fewest rows: those have to be rewritten.
+    // The free column that stands in the fewest rows is cheapest, because those rows have to be rewritten.
     std::optional<Column> free;
     for (const auto& cell : row.cells()) {
         if (tableau.kind(cell.column) == Kind::Free
@@ -156,7 +157,8 @@ void LayoutSolver::Impl::makeFeasible()
         rebuild();
 }
 
-/// The way out when constants contradict each other: everything anew, the older constraints first.
+/// Builds the tableau anew, the older constraints first, because the constants that were set contradict each
+/// other.
 void LayoutSolver::Impl::rebuild()
 {
     tableau = {};

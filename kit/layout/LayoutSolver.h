@@ -14,9 +14,9 @@
 namespace kit {
 
 /// Solves systems of linear equations and inequalities over real numbers, incrementally, by the Cassowary
-/// method (a simplex tableau that is kept solved). Constraints that are not required may be missed; what is
-/// missed is least by priority: a constraint is never given up for any number of constraints of lower
-/// priorities, and among equals the sum of the misses is least. It knows nothing of views. Variables may be
+/// method (a simplex tableau that is kept solved). Constraints that are not required may be missed. A
+/// constraint is never missed for the sake of any number of constraints of lower priorities, and the sum of
+/// the misses at one priority is as small as possible. The solver knows nothing of views. Variables may be
 /// negative.
 class LayoutSolver {
 public:
@@ -33,27 +33,27 @@ public:
     LayoutSolver(LayoutSolver&&) noexcept;
     LayoutSolver& operator=(LayoutSolver&&) noexcept;
 
-    /// A variable that no constraint names is 0.
+    /// Adds a variable, which is 0 until a constraint names it.
     Variable addVariable();
-    /// The variable may be handed out again. Its constraints have to be removed first.
+    /// Removes a variable, whose number may be used again. Its constraints have to be removed first.
     void removeVariable(Variable variable);
 
-    /// Adds: sum of terms (relation) constant. Nothing, and an unchanged system, when the constraint is
-    /// required and contradicts what is required already.
+    /// Adds: sum of terms (relation) constant. Answers nothing, and leaves the system unchanged, when the
+    /// constraint is required and contradicts the required ones.
     std::optional<ConstraintId> addConstraint(
         std::span<const Term> terms, LayoutRelation relation, double constant, LayoutPriority priority);
-    /// Wishes a value for a variable, with a priority against more and one against less; both are below 1000,
-    /// and 0 or less allows what it is about.
+    /// Wishes a value for a variable, with one priority against a larger and one against a smaller value.
+    /// Both are below 1000; 0 or less allows that deviation freely.
     ConstraintId addWish(
         Variable variable, double value, LayoutPriority againstMore, LayoutPriority againstLess);
     void removeConstraint(ConstraintId id);
-    /// Takes effect with the next `solve`.
+    /// The constant takes effect with the next `solve`.
     void setConstant(ConstraintId id, double constant);
 
-    /// Brings the values up to date. Answers the required constraints that had to be given up, because
-    /// constants that were set contradict each other; they are removed, the younger before the older.
+    /// Brings the values up to date. Answers the required constraints that it removed because constants that
+    /// were set contradict each other; it removes the younger before the older.
     std::vector<ConstraintId> solve();
-    /// As of the last `solve`.
+    /// Answers the value as of the last `solve`.
     double value(Variable variable) const;
 
 private:

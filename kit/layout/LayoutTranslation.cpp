@@ -59,7 +59,7 @@ std::optional<LayoutRule> LayoutTranslation::translate(const LayoutConstraint& c
     if (!first || !isInTree(*first) || (!constraint.second().isNone() && (!second || !isInTree(*second))))
         return std::nullopt;
     const bool rightToLeft = _root.isRightToLeft();
-    // Distances along the reading direction count from the right then.
+    // In a right-to-left layout, distances along the reading direction count from the right.
     const bool isMirrored = rightToLeft
         && (isRelativeToDirection(constraint.first().attribute())
             || isRelativeToDirection(constraint.second().attribute()));
@@ -82,7 +82,7 @@ bool LayoutTranslation::isInTree(const LayoutItem& item) const
     return above && isInTree(*above);
 }
 
-/// The nearest item around both sides; a position alone is one in the parent.
+/// Answers the nearest item around both sides. A constraint on one position alone is relative to the parent.
 std::shared_ptr<LayoutItem> LayoutTranslation::commonSpace(const LayoutConstraint& constraint) const
 {
     auto space = constraint.first().item();
@@ -132,7 +132,7 @@ void LayoutTranslation::add(LayoutRule& rule, const Side& side, double factor)
     }
 }
 
-/// A line across the item, at a share of its length from its origin.
+/// Adds the position of a line across the item, at a share of its length from its origin.
 void LayoutTranslation::addPosition(
     LayoutRule& rule, const Side& side, Axis axis, double share, double factor)
 {

@@ -13,7 +13,7 @@
 
 namespace kit {
 
-/// The place and size of a item in the solver; the origin is in the parent's coordinates.
+/// The place and the size of an item in the solver. The origin is in the parent's coordinates.
 struct LayoutVariables {
     LayoutSolver::Variable x, y, width, height;
 };
@@ -27,15 +27,15 @@ struct LayoutRule {
     bool hasSameTerms(const LayoutRule& other) const;
 };
 
-/// Turns constraints between the items of one tree into rules. The frame of a item without variables is a
-/// number.
+/// Turns constraints between the items of one tree into rules. The frame of an item that has no variables
+/// enters a rule as a number.
 class LayoutTranslation {
 public:
     using Variables = std::unordered_map<const LayoutItem*, LayoutVariables>;
 
     LayoutTranslation(const LayoutItem& root, const Variables& variables);
 
-    /// Nothing when the items do not both stand in the tree, or when there is nothing to solve.
+    /// Answers nothing when one of the items is not in the tree, or when the rule has no variable.
     std::optional<LayoutRule> translate(const LayoutConstraint& constraint);
     /// The items whose frames went into rules as numbers.
     const std::unordered_set<const LayoutItem*>& framesUsed() const { return _framesUsed; }
@@ -45,7 +45,7 @@ private:
     struct Side {
         const LayoutItem* item;
         LayoutAttribute attribute;
-        const LayoutItem* space; ///< in whose coordinates
+        const LayoutItem* space; ///< the item in whose coordinates the side is meant
     };
     std::shared_ptr<LayoutItem> commonSpace(const LayoutConstraint& constraint) const;
     bool isInTree(const LayoutItem& item) const;

@@ -10,9 +10,9 @@ namespace kit {
 
 namespace {
 
-// Above every priority: the objective of the first phase, while an equation is being added.
+// The objective of the first phase, while an equation is being added, comes before every priority.
 constexpr LayoutPriority firstPhase = 1e9F;
-// A layout takes a few pivots for each constraint; this bound only ends a numerical breakdown.
+// A layout takes a few pivots for each constraint. This bound ends the search after a numerical breakdown.
 constexpr int maximumPivots = 20000;
 
 } // namespace
@@ -87,14 +87,14 @@ void SimplexTableau::addCost(Column column, LayoutPriority priority, double cost
     addTo(_levels[priority], column, cost);
 }
 
-/// The rows that the column does stand in, each once.
+/// Answers the rows that really contain the column, each once, and drops the others from the list.
 const std::vector<std::int32_t>& SimplexTableau::weeded(
     Column column, std::vector<std::int32_t>& rows, bool restricted)
 {
     ++_stamp;
     std::erase_if(rows, [&](std::int32_t index) {
         auto& row = _rows[index];
-        // A place among the rows may have come to hold a row of the other kind.
+        // The index may have been reused for a row of the other kind.
         if (!row.inUse || isRestricted(index) != restricted || row.stamp == _stamp
             || row.row.coefficient(column) == 0)
             return true;
@@ -188,7 +188,8 @@ void SimplexTableau::pivot(std::int32_t index, Column entering)
     SparseRow row = removeRow(index);
     row.solveFor(leaving, entering);
     substituteInRestrictedRows(entering, row);
-    // What names a free column again must not hide behind a basic column.
+    // The rows of free columns are rewritten as well, because a free column that they name may not stay
+    // hidden behind a basic column.
     if (kind(leaving) == Kind::Free)
         substituteInFreeRows(entering, row);
     substituteInCosts(entering, row);
@@ -218,7 +219,7 @@ bool SimplexTableau::addEquation(SparseRow row)
         return false;
     }
     if (index != noRow) {
-        // Any column may take its place at 0; a row without one says 0 = 0.
+        // Any column may take its place at 0. A row without columns says 0 = 0 and is dropped.
         const auto& cells = _rows[index].row.cells();
         const auto entering = std::find_if(cells.begin(), cells.end(),
             [this](const auto& cell) { return kind(cell.column) != Kind::Dummy; });
@@ -239,7 +240,7 @@ void SimplexTableau::removeEquation(Column marker, std::optional<Column> other)
             return;
         pivot(row, marker);
     }
-    // The equation is the only one that joins the two columns, so with the marker both leave every other row.
+    // This equation alone joins the two columns, so taking the marker out of every other row takes out both.
     const auto behind = freeRowsWith(marker);
     for (const auto row : behind)
         bringUpToDate(row);
@@ -251,7 +252,7 @@ void SimplexTableau::removeEquation(Column marker, std::optional<Column> other)
     removeRow(_columns[marker].row);
 }
 
-/// The row through which a marker can become basic without making other rows negative.
+/// Answers the row through which a marker can become basic without making other rows negative.
 std::int32_t SimplexTableau::rowForMarker(Column marker)
 {
     std::int32_t falling = noRow, rising = noRow;
@@ -308,7 +309,8 @@ bool SimplexTableau::minimizeLevel(Levels::iterator level)
             return true;
         const auto row = leavingRow(*entering);
         if (row == noRow) {
-            // An objective is a sum of what is never negative, so this is a rounding error.
+            // An objective is a sum of terms that are never negative, so it can only fall further by a
+            // rounding error.
             level->second.take(*entering);
             continue;
         }
@@ -317,7 +319,7 @@ bool SimplexTableau::minimizeLevel(Levels::iterator level)
     return false;
 }
 
-/// The first column that makes this objective less and leaves the ones above it as they are.
+/// Answers the first column that lowers this objective and leaves those of higher priority as they are.
 std::optional<SimplexTableau::Column> SimplexTableau::enteringColumn(Levels::const_iterator level) const
 {
     for (const auto& cell : level->second.cells()) {
@@ -338,11 +340,11 @@ std::int32_t SimplexTableau::leavingRow(Column entering)
     for (const auto index : restrictedRowsWith(entering)) {
         const auto& row = _rows[index].row;
         const double coefficient = row.coefficient(entering);
-        // A basic dummy may neither grow nor shrink.
+        // A basic dummy column may neither grow nor shrink.
         if (coefficient > 0 && kind(_rows[index].basic) != Kind::Dummy)
             continue;
         const double ratio = std::abs(row.constant / coefficient);
-        // Among equals the lowest column leaves, or degenerate pivots could go round in circles.
+        // The lowest of equal columns leaves, because degenerate pivots could otherwise go round in circles.
         if (ratio < least || (ratio == least && _rows[index].basic < _rows[found].basic)) {
             least = ratio;
             found = index;
@@ -372,7 +374,7 @@ bool SimplexTableau::restoreFeasibility()
     return true;
 }
 
-/// Among the columns that lift the row, the one that keeps the objectives least.
+/// Answers, of the columns that lift the row, the one that raises the objectives least.
 std::optional<SimplexTableau::Column> SimplexTableau::dualEntering(const SparseRow& row) const
 {
     std::optional<SparseRow::Cell> best;

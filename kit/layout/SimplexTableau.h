@@ -12,13 +12,14 @@
 
 namespace kit {
 
-/// A simplex tableau in basic feasible form with one objective for each priority; the objectives are
-/// minimised in the order of the priorities. The solver's engine room: it knows columns, not constraints.
+/// A simplex tableau in basic feasible form with one objective for each priority. The objectives are
+/// minimised in the order of the priorities. It knows columns, not constraints: `LayoutSolver` translates.
 ///
-/// A column is basic (it has a row that says what it equals) or not (then it is 0). Free columns, once basic,
-/// stay so; a free column that is not basic stands in rows of other free columns only. The rows of restricted
-/// columns name no basic column. The rows of free columns, which take no part in the pivots, are brought up
-/// to date only when they are needed: until then they may name restricted columns that have become basic.
+/// A column is basic (it has a row that says what it equals) or not (then it is 0). A free column that became
+/// basic stays basic; a free column that is not basic stands only in rows of other free columns. The rows of
+/// restricted columns name no basic column. The rows of free columns take no part in the pivots and are
+/// brought up to date only when they are needed, so until then they may name restricted columns that have
+/// become basic.
 class SimplexTableau {
 public:
     using Column = SparseRow::Column;
@@ -31,30 +32,31 @@ public:
     };
 
     Column addColumn(Kind kind);
-    /// Frees a column that stands in no equation any more.
+    /// Releases a column that stands in no equation any more.
     void freeColumn(Column column);
     Kind kind(Column column) const { return _columns[column].kind; }
     double value(Column column) const;
-    /// In how many rows a free column stands, at most.
+    /// Answers an upper bound of the number of rows in which a free column stands.
     std::size_t occurrenceCount(Column column) const { return _columns[column].inFreeRows.size(); }
 
-    /// Adds `factor` times a column to an expression, by its row when it is basic.
+    /// Adds `factor` times a column to an expression. A basic column is replaced by its row.
     void addTo(SparseRow& expression, Column column, double factor);
     void addCost(Column column, LayoutPriority priority, double cost);
 
     /// Adds the equation 0 = `row` by making `subject`, a column of it, basic.
     void addEquation(SparseRow row, Column subject);
-    /// Adds the equation 0 = `row`, whose constant is not negative, where no column can be basic at once.
-    /// False, and no change, when the equation contradicts the others.
+    /// Adds the equation 0 = `row`, whose constant is not negative, where no column can become basic at once.
+    /// Answers false, and changes nothing, when the equation contradicts the others.
     bool addEquation(SparseRow row);
-    /// Removes the one equation that the marker stands in, and the other column with it, if there is one.
+    /// Removes the one equation in which the marker stands, and with it the other column, if there is one.
     void removeEquation(Column marker, std::optional<Column> other);
-    /// Changes the one equation that the marker stands in as if the marker had this much less.
+    /// Changes the constant of the one equation in which the marker stands, as if the marker were less by
+    /// this amount.
     void shift(Column marker, double amount);
 
-    /// Makes the objectives least. Does not terminate early but on a numerical breakdown.
+    /// Minimises the objectives. It ends before the optimum only after a numerical breakdown.
     void minimize();
-    /// Makes rows whose constants have become negative feasible again. False: there is no way.
+    /// Makes rows whose constants have become negative feasible again. Answers false when that is impossible.
     bool restoreFeasibility();
     bool isFeasible() const { return _infeasible.empty(); }
 
@@ -62,8 +64,9 @@ private:
     static constexpr std::int32_t noRow = -1;
     struct ColumnState {
         Kind kind = Kind::Unused;
-        std::int32_t row = noRow; ///< where it is basic
-        // Rows that it may stand in, by the kind of their basic columns; stale entries are weeded out.
+        std::int32_t row = noRow; ///< the row in which the column is basic
+        // The rows in which the column may stand, by the kind of their basic columns. Stale entries are
+        // removed when a list is read.
         std::vector<std::int32_t> inRestrictedRows, inFreeRows;
     };
     struct BasicRow {

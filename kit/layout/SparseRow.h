@@ -9,7 +9,7 @@
 
 namespace kit {
 
-/// A linear expression of few of many columns: constant + sum of coefficient * column.
+/// A linear expression in a few of many columns: constant + sum of coefficient * column.
 class SparseRow {
 public:
     using Column = std::uint32_t;
@@ -19,25 +19,25 @@ public:
         double coefficient;
     };
 
-    /// What is smaller counts as 0; far below any length that can be seen.
+    /// Smaller values count as 0, because they are far below any length that can be seen.
     static constexpr double epsilon = 1e-8;
     static bool isNearZero(double value) { return std::abs(value) < epsilon; }
 
     double constant = 0;
 
-    /// Sorted by column.
+    /// The cells are sorted by column.
     const std::vector<Cell>& cells() const { return _cells; }
     double coefficient(Column column) const; ///< 0 for a column that is not there
     void add(Column column, double coefficient);
     /// Removes a column and answers its coefficient.
     double take(Column column);
     void scale(double factor);
-    /// From 0 = this row to column = this row.
+    /// Turns 0 = this row into column = this row.
     void solveFor(Column column);
-    /// From `from` = this row to `to` = this row.
+    /// Turns `from` = this row into `to` = this row.
     void solveFor(Column from, Column to);
 
-    /// Adds another row times a factor; `onNew` hears of each column that was not there before.
+    /// Adds another row times a factor, and calls `onNew` for each column that this row did not have before.
     template <typename OnNew>
     void addScaled(const SparseRow& other, double factor, OnNew&& onNew);
 

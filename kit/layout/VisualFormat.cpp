@@ -41,7 +41,7 @@ struct Item {
     bool isSuperview = false;
 };
 
-/// Reads one format from left to right; the first thing that is wrong ends it.
+/// Reads one format from left to right and stops at the first error.
 class Parser {
 public:
     Parser(std::string_view format, const VisualFormatInput& input)
@@ -139,7 +139,7 @@ private:
         return Item{view, false};
     }
 
-    /// Absent: touching. Without predicates: the standard distance.
+    /// Answers nothing when the views touch, and no predicates when they have the standard distance.
     std::optional<Predicates> parseConnection()
     {
         if (!accept("-"))

@@ -14,7 +14,7 @@
 
 namespace kit {
 
-/// What a visual format is read with.
+/// The names and the alignment with which a visual format is read.
 struct VisualFormatInput {
     std::map<std::string, std::shared_ptr<LayoutItem>, std::less<>>
         views; ///< by the names in square brackets
@@ -36,14 +36,15 @@ struct VisualFormatResult {
 /// Turns a line such as "H:|-16-[a(>=50@750)]-[b(==a)]-|" into constraints:
 ///   orientation  "H:" (the default) or "V:"
 ///   edge         "|", the superview's edge; horizontally the leading and the trailing one
-///   view         "[name]", "[name(predicates)]" with predicates ">=50", "==other", "width@priority", by
-///   commas connection   "" (touching), "-" (the standard distance: 8 between views, 20 to the superview),
+///   view         "[name]", "[name(predicates)]" with predicates ">=50", "==other", "width@priority"
+///   connection   "" (touching), "-" (the standard distance: 8 between views, 20 to the superview),
 ///                "-12-", "-metric-", "-(>=8,<=20@700)-"
 namespace VisualFormat {
 
 VisualFormatResult parse(std::string_view format, const VisualFormatInput& input);
 
-/// The constraints of a format that is known to be right; a wrong one gives none and a line in the log.
+/// Answers the constraints of a format that is known to be right. A wrong format gives none and a line in the
+/// log.
 LayoutConstraints constraints(std::string_view format, const VisualFormatInput& input);
 
 } // namespace VisualFormat

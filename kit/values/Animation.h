@@ -18,13 +18,13 @@ struct AnimationOptions {
     bool beginsFromCurrentState = false;
 };
 
-/// Runs changes that a host may show as a movement. The model changes at once, `completion` is called right
-/// after. While `changes` runs, `currentAnimation()` answers the options to the peers that are told of the
-/// changes. Main thread only.
+/// Runs changes that a host may show as a movement. The model changes at once, and `completion` is called
+/// right afterwards. While `changes` runs, peers that are told of a change read the options from
+/// `currentAnimation()`. Main thread only.
 void animate(const AnimationOptions& options, const std::function<void()>& changes,
     const std::function<void()>& completion = {});
 
-/// Null outside of `animate`.
+/// Answers null outside of `animate`.
 const AnimationOptions* currentAnimation();
 
 } // namespace kit

@@ -14,7 +14,7 @@
 
 namespace kit {
 
-/// How one piece of a styled text is set; what is absent comes from the label that shows it.
+/// Says how one piece of a styled text is set. The label that shows the text gives the absent values.
 struct TextAttributes {
     std::optional<Font> font;
     std::optional<Color> color;
@@ -43,7 +43,7 @@ public:
 
     const std::vector<TextRun>& runs() const { return _runs; }
     bool isEmpty() const { return _runs.empty(); }
-    /// The characters alone, without the images.
+    /// Answers the characters alone, without the images.
     std::string plainText() const;
 
     bool operator==(const AttributedText&) const = default;

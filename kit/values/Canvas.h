@@ -21,7 +21,7 @@ struct Pie {
     bool operator==(const Pie&) const = default;
 };
 
-/// What a view draws into, in the view's own coordinates. It is valid during the call that hands it out.
+/// A surface for drawing, in the view's own coordinates. It is valid during the call that hands it out.
 class Canvas {
 public:
     virtual ~Canvas() = default;
@@ -37,7 +37,7 @@ public:
     virtual void fillPie(const Pie& pie) = 0;
     virtual void strokeArc(const Pie& arc) = 0;
     virtual void drawImage(const Image& image, const Rect& rect) = 0;
-    /// One line; `origin` is the left end of the baseline. Drawn in the fill colour.
+    /// Draws one line in the fill colour. `origin` is the left end of the baseline.
     virtual void drawText(std::string_view text, const Font& font, Point origin) = 0;
 };
 

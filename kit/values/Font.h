@@ -21,10 +21,10 @@ enum class TextStyle {
 
 enum class FontWeight { Regular, Bold };
 
-/// Whether a font grows and shrinks with the user's text-size setting.
+/// Says whether a font grows and shrinks with the user's text-size setting.
 enum class TextSizing { FollowsSetting, Fixed };
 
-/// Lengths of a font in points, measured from the baseline; what hangs below it is negative.
+/// Lengths of a font in points, measured from the baseline. A length below the baseline is negative.
 struct FontMetrics {
     double ascender = 0, descender = 0, capHeight = 0, lineHeight = 0;
 };
@@ -36,14 +36,14 @@ struct Font {
     FontWeight weight = FontWeight::Regular;
     TextSizing sizing = TextSizing::FollowsSetting;
 
-    /// The role's font in its standard size and weight.
+    /// Answers the role's font in its standard size and weight.
     static Font preferred(TextStyle style);
     static Font preferred(TextStyle style, double pointSize);
 
     Font bold() const;
     Font fixed() const;
 
-    /// As the installed text measurer has it.
+    /// Answers the metrics as the installed text measurer knows them.
     FontMetrics metrics() const;
     double lineHeight() const { return metrics().lineHeight; }
 

@@ -9,17 +9,17 @@
 
 namespace kit {
 
-/// What a keyboard notice says: the area that the on-screen keyboard covers, in the window's coordinates, and
-/// how it moves there.
+/// The area that the on-screen keyboard covers, in the window's coordinates, and how the keyboard moves
+/// there.
 struct KeyboardNotice {
     Rect beginFrame;
     Rect endFrame;
     double animationDuration = 0.25; ///< seconds
     int animationCurve = 7; ///< 0 to 3 are the curves of AnimationCurve, above that the keyboard's own
 
-    /// To and from the user information of the notices KeyboardWillShow and KeyboardWillHide ("height",
-    /// "beginFrame", "endFrame", "animationDuration", "animationCurve"). What is missing keeps its default;
-    /// "height" alone gives both frames that height.
+    /// Convert from and to the user information of the notices KeyboardWillShow and KeyboardWillHide
+    /// ("height", "beginFrame", "endFrame", "animationDuration", "animationCurve"). A missing key keeps its
+    /// default; "height" alone gives both frames that height.
     static KeyboardNotice fromUserInfo(const PropertyDictionary& userInfo);
     PropertyDictionary toUserInfo() const;
 

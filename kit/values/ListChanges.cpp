@@ -13,7 +13,7 @@ namespace {
 
 constexpr std::size_t nowhere = std::numeric_limits<std::size_t>::max();
 
-/// For each row of `after` its index in `before`.
+/// Answers for each row of `after` its index in `before`.
 std::vector<std::size_t> oldIndexes(std::span<const RowId> before, std::span<const RowId> after)
 {
     std::unordered_map<RowId, std::size_t> places;
@@ -28,7 +28,8 @@ std::vector<std::size_t> oldIndexes(std::span<const RowId> before, std::span<con
     return old;
 }
 
-/// Keeps a longest rising run of old indexes: those rows stay where they are, the others count as moved.
+/// Keeps the longest rising run of old indexes. Those rows stay where they are, and the others count as
+/// moved.
 void keepLongestRise(std::vector<std::size_t>& old)
 {
     std::vector<std::size_t> tails; // the new index that ends the best run of each length
@@ -54,7 +55,7 @@ void keepLongestRise(std::vector<std::size_t>& old)
     }
 }
 
-/// Makes a splice reach to the end of a later one; the rows between them go and come again.
+/// Makes a splice reach to the end of a later one. The rows between them are removed and inserted again.
 void extend(ListSplice& splice, const ListSplice& later)
 {
     const auto between = later.position - (splice.position + splice.inserted);
@@ -69,9 +70,9 @@ std::vector<ListSplice> ListChanges::splicesExactWithin(const RowRange& range) c
     enum class Place { Before, Within, Behind };
     std::vector<ListSplice> merged;
     auto last = Place::Within;
-    std::size_t removed = 0, inserted = 0; // by the splices so far
+    std::size_t removed = 0, inserted = 0; // the rows removed and inserted by the splices so far
     for (const auto& splice : splices) {
-        const auto begin = splice.position + removed - inserted; // in the list as it was
+        const auto begin = splice.position + removed - inserted; // the index in the old list
         auto place = begin >= range.end() ? Place::Behind : Place::Within;
         if (begin + splice.removed <= range.first)
             place = Place::Before;

@@ -11,7 +11,7 @@
 
 namespace kit {
 
-/// Rows from `first` on, `count` of them.
+/// A range of `count` rows that begins at `first`.
 struct RowRange {
     std::size_t first = 0;
     std::size_t count = 0;
@@ -21,7 +21,7 @@ struct RowRange {
     bool operator==(const RowRange&) const = default;
 };
 
-/// At `position`, `removed` rows go and `inserted` rows come.
+/// Says that at `position` `removed` rows go and `inserted` rows come.
 struct ListSplice {
     std::size_t position = 0, removed = 0, inserted = 0;
     bool operator==(const ListSplice&) const = default;
@@ -29,19 +29,21 @@ struct ListSplice {
 
 /// An exact difference between two states of a list.
 struct ListChanges {
-    /// To be applied one after the other: each position is in the list as the splices before it have left it.
+    /// The splices apply one after the other: each position is in the list as the splices before it have left
+    /// it.
     std::vector<ListSplice> splices;
-    /// Rows, by their new indexes, that stayed and show something else.
+    /// The rows, by their new indexes, that stayed and show something else.
     std::vector<RowRange> changed;
 
     bool isEmpty() const { return splices.empty() && changed.empty(); }
 
-    /// The same way in fewer steps: what lies before the rows of a range (of the list as it was) is one
-    /// splice, what lies behind them another; those at the rows themselves stay as they are.
+    /// Answers the same difference in fewer splices. The splices before the rows of a range (of the old list)
+    /// become one, and so do the splices behind them; those at the rows themselves stay as they are.
     std::vector<ListSplice> splicesExactWithin(const RowRange& range) const;
 
-    /// The shortest way from one order of rows to another: what is in both orders and keeps its sequence
-    /// stays, what moves is removed and inserted. Identifiers are unique within an order. n log n.
+    /// Answers the shortest difference between two orders of rows. Rows that are in both orders and keep
+    /// their sequence stay; rows that move are removed and inserted. Identifiers are unique within an order.
+    /// It takes n log n steps.
     static ListChanges between(std::span<const RowId> before, std::span<const RowId> after);
 };
 

@@ -14,7 +14,7 @@
 
 namespace kit {
 
-/// Names a row for as long as its list lives, wherever it stands.
+/// Names a row for as long as its list lives, however the order changes.
 using RowId = std::uint64_t;
 
 enum class RowKind { Item, SectionHeader };
@@ -22,7 +22,8 @@ enum class RowAccessory { None, Disclosure };
 enum class CheckState { None, Off, On };
 enum class DownloadState { Present, InCloud, Downloading };
 
-/// Everything that one row of a list shows. A value: made when a row is about to be seen, gone afterwards.
+/// Everything that one row of a list shows. A value that is made when the row is about to be seen and dropped
+/// afterwards.
 struct ListRow {
     RowId id = 0;
     RowKind kind = RowKind::Item;

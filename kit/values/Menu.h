@@ -15,7 +15,7 @@ namespace kit {
 
 enum class MenuActionStyle { Default, Destructive };
 
-/// Whether an entry is a choice, and if it is the present one.
+/// Says whether an entry is one of several choices, and whether it is the present one.
 enum class MenuMark { None, Off, On };
 
 /// One entry of a context menu.

@@ -8,8 +8,8 @@
 
 namespace kit {
 
-/// The place where a kit object keeps the peer that mirrors it: weak, so that a destroyed peer is never
-/// called. Main thread only.
+/// Holds the peer that mirrors a kit object. The reference is weak, so that a destroyed peer is never called.
+/// Main thread only.
 template <typename Observer>
 class ObserverSlot {
 public:

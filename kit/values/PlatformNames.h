@@ -6,7 +6,7 @@
 namespace platform {
 }
 
-/// The kit calls the platform's services and values by their own names.
+/// The kit uses the names of the platform's services and values without a prefix.
 namespace kit {
 
 using namespace platform;

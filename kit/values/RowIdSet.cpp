@@ -13,8 +13,8 @@ namespace {
 
 constexpr std::size_t fewestPlaces = 16;
 
-// Identifiers may be plain numbers as well as hashes: their bits are spread (a multiplier of a well-known
-// 64-bit mixer).
+// Identifiers may be plain numbers as well as hashes, so their bits are spread (by a multiplier of a
+// well-known 64-bit mixer).
 std::size_t spread(RowId id)
 {
     id ^= id >> 32;
@@ -80,7 +80,7 @@ void RowIdSet::erase(RowId id)
     const auto mask = _places.size() - 1;
     auto hole = place(id);
     --_count;
-    // What stands behind the hole moves up, unless that would be before its own place.
+    // The identifiers behind the hole move up, unless one would then stand before its own place.
     for (auto next = (hole + 1) & mask; _places[next] != emptyMark; next = (next + 1) & mask) {
         const auto home = spread(_places[next]) & mask;
         if (((next - home) & mask) < ((next - hole) & mask))

@@ -11,8 +11,8 @@
 
 namespace kit {
 
-/// A set of row identifiers in one block of memory: 100,000 of them go in within a millisecond or two, which
-/// a set of nodes takes twenty for. A value.
+/// A set of row identifiers in one block of memory. Inserting 100,000 of them takes a millisecond or two; a
+/// set of nodes takes twenty. A value.
 class RowIdSet {
 public:
     bool contains(RowId id) const;
@@ -27,14 +27,15 @@ public:
     bool operator==(const RowIdSet& other) const;
 
 private:
-    /// Marks a place without an identifier; the identifier of this value is kept apart.
+    /// Marks a place without an identifier. An identifier of this value is kept in `_hasEmptyMark`.
     static constexpr RowId emptyMark = 0;
 
     void reserve(std::size_t count);
-    /// Where an identifier is, or where it would go.
+    /// Answers the place where an identifier is, or where it would go.
     std::size_t place(RowId id) const;
 
-    std::vector<RowId> _places; ///< a power of two of them, at most half of them taken
+    std::vector<RowId>
+        _places; ///< the number of places is a power of two, and at most half of them are taken
     std::size_t _count = 0;
     bool _hasEmptyMark = false;
 };

@@ -12,7 +12,7 @@ namespace kit {
 
 enum class UserInterfaceIdiom { Phone, Tablet };
 
-/// How the interface is held, with the numbers that layout rules use.
+/// Says how the device is held, with the numbers that layout rules use.
 enum class InterfaceOrientation {
     Portrait = 1,
     PortraitUpsideDown = 2,
@@ -20,18 +20,18 @@ enum class InterfaceOrientation {
     LandscapeRight = 4,
 };
 
-/// What is known of the display that shows the application.
+/// The properties of the display that shows the application.
 struct Screen {
     Rect bounds; ///< points
     double scale = 1; ///< device pixels to a point
     UserInterfaceIdiom idiom = UserInterfaceIdiom::Phone;
     Rect statusBarFrame; ///< the strip at the top that the system draws into; zero when there is none
 
-    /// The main screen; nothing on a machine without a display. Main thread only.
+    /// Answers the main screen, or nothing on a machine without a display. Main thread only.
     static const std::optional<Screen>& main();
     static void setMain(std::optional<Screen> screen);
 
-    /// Device pixels to a point on the main screen, 1 without one.
+    /// Answers the device pixels to a point on the main screen, and 1 without one.
     static double mainScale();
 
     bool operator==(const Screen&) const = default;

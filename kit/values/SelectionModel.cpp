@@ -85,7 +85,7 @@ bool SelectionModel::keepOnly(std::span<const RowId> order)
             kept.insert(id);
     }
     _ids = std::move(kept);
-    // What was selected before the range may hold rows that are gone.
+    // The range's earlier selection may hold rows that are gone, so the next range starts anew.
     _range.reset();
     return _ids.size() != before;
 }

@@ -12,7 +12,7 @@
 
 namespace kit {
 
-/// Which rows are selected, by identifier, so that a selection outlives every change of order. A value that
+/// The identifiers of the selected rows. A selection keeps its rows when their order changes. A value that
 /// knows no list and no widget.
 class SelectionModel {
 public:
@@ -22,25 +22,25 @@ public:
 
     void select(RowId id);
     void deselect(RowId id);
-    /// True when the row is selected afterwards. The row becomes the start of the next range.
+    /// Answers whether the row is selected afterwards. The row becomes the start of the next range.
     bool toggle(RowId id);
     void selectOnly(RowId id);
     void selectAll(std::span<const RowId> order);
-    /// Makes everything from the row touched last to this one, both included, what the row touched last is:
-    /// selected or not. A further call replaces the range of the one before. Without such a row this one
-    /// alone is selected.
+    /// Gives every row from the one touched last to this one, both included, the state of the row touched
+    /// last: selected or not. A further call replaces the range of the call before. When no row was touched
+    /// before, this row alone is selected.
     void extendTo(RowId id, std::span<const RowId> order);
     void clear();
 
-    /// Forgets what is not in the list any more. True when something was forgotten.
+    /// Drops identifiers that are not in the list any more. Answers whether it dropped one.
     bool keepOnly(std::span<const RowId> order);
-    /// The selected rows in the order of the list.
+    /// Answers the selected rows in the order of the list.
     std::vector<RowId> inOrder(std::span<const RowId> order) const;
 
     bool operator==(const SelectionModel& other) const { return _ids == other._ids; }
 
 private:
-    /// A range that is being drawn, and what was selected before it.
+    /// The range that is being extended, and the selection before it began.
     struct Range {
         RowIdSet before;
         bool selects;

@@ -16,7 +16,7 @@ std::size_t characterCount(std::string_view text)
         std::count_if(text.begin(), text.end(), [](unsigned char byte) { return (byte & 0xC0U) != 0x80U; }));
 }
 
-/// Fills lines word by word; a word that is wider than a line is broken.
+/// Fills lines word by word, and breaks a word that is wider than a line.
 class LineFiller {
 public:
     explicit LineFiller(double maxWidth)

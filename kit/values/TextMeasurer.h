@@ -26,15 +26,15 @@ class TextMeasurer {
 public:
     virtual ~TextMeasurer() = default;
 
-    /// The size of a text in points, wrapped at word boundaries.
+    /// Answers the size of a text in points, wrapped at word boundaries.
     virtual Size measure(std::string_view text, const Font& font, const TextLimits& limits) const = 0;
-    /// Runs without a font of their own are measured in `font`.
+    /// Pieces of the text that name no font are measured in `font`.
     virtual Size measure(const AttributedText& text, const Font& font, const TextLimits& limits) const = 0;
     virtual FontMetrics metrics(const Font& font) const = 0;
 
     static const TextMeasurer& current();
-    /// Null brings the plain measurer back. Views that were laid out before keep their sizes until they
-    /// change.
+    /// Installs a measurer; null installs the plain one again. Views that were laid out before keep their
+    /// sizes until they change.
     static void install(std::shared_ptr<const TextMeasurer> measurer);
 };
 

@@ -9,7 +9,7 @@ enum class SizeClass { Compact, Regular };
 enum class LayoutDirection { LeftToRight, RightToLeft };
 enum class ColorScheme { Light, Dark };
 
-/// The surroundings that a view adapts to.
+/// The properties of the surroundings to which a view adapts.
 struct TraitCollection {
     SizeClass horizontalSizeClass = SizeClass::Compact;
     SizeClass verticalSizeClass = SizeClass::Regular;
@@ -18,7 +18,7 @@ struct TraitCollection {
 
     bool isRightToLeft() const { return layoutDirection == LayoutDirection::RightToLeft; }
 
-    /// The application's traits: what holds for every view that stands in no window. Main thread only.
+    /// Answers the application's traits, which hold for every view that is in no window. Main thread only.
     static const TraitCollection& application();
     static void setApplication(const TraitCollection& traits);
 

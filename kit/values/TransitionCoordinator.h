@@ -10,13 +10,13 @@
 
 namespace kit {
 
-/// Handed to a screen that is about to change its size: collects what changes along with it.
+/// Collects what runs along with a screen's change of size. It is handed to the screen before the change.
 class TransitionCoordinator {
 public:
-    /// `alongside` runs with the change, `completion` after it; each once.
+    /// `alongside` runs with the change and `completion` after it, each of them once.
     void animateAlongside(std::function<void()> alongside, std::function<void()> completion = {});
 
-    /// The kit's affair: the change takes place.
+    /// The kit calls this when the change takes place.
     void run();
 
 private:

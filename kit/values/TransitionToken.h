@@ -8,17 +8,18 @@
 
 namespace kit {
 
-/// What a peer holds while it shows a transition. The model has changed already; what has to wait for the end
-/// of the movement runs once, when `finish()` is called or when the last copy of the token is destroyed, so
-/// that a peer that dies in the middle loses nothing. Without an observer it runs at once, and the next
-/// change finishes what still runs. Main thread only.
+/// A peer holds a token while it shows a transition. The model has already changed; the callbacks that wait
+/// for the end of the movement run once, when `finish()` is called or when the last copy of the token is
+/// destroyed. Because of that, a peer that is destroyed during the movement loses no callback. Without an
+/// observer the callbacks run at once, and the next change finishes a movement that still runs. Main thread
+/// only.
 class TransitionToken {
 public:
-    /// A token that is finished already.
+    /// Makes a token that is finished already.
     TransitionToken() = default;
     explicit TransitionToken(std::function<void()> atEnd);
 
-    /// Runs what waits. Later calls do nothing.
+    /// Runs the waiting callbacks. Later calls do nothing.
     void finish() const;
     bool isFinished() const;
 

@@ -12,22 +12,23 @@
 
 namespace kit {
 
-/// What is typed in quick succession to find a row by the beginning of its name. A value.
+/// The characters that the user types in quick succession to find a row by the beginning of its name. A
+/// value.
 class TypeAhead {
 public:
     /// A pause of more than this many seconds begins a new text.
     static constexpr double pause = 1;
 
-    /// Adds a character, as UTF-8, that was typed at a time.
+    /// Adds a character, as UTF-8, that was typed at the time `now`.
     void type(std::string_view character, Date now);
     void clear() { _text.clear(); }
-    /// Whether a key pressed now goes on with the text.
+    /// Answers whether a key pressed now continues the text.
     bool isActive(Date now) const;
 
-    /// What to look for: one character typed again and again is looked for as one, so that it leads to the
-    /// next row each time.
+    /// Answers the text to look for. One character typed again and again is answered as one, so that each
+    /// press leads to the next row.
     std::string_view sought() const;
-    /// Where to begin to look, with the keyboard at a row.
+    /// Answers the row at which the search begins when the keyboard is at the row `focused`.
     std::size_t start(std::size_t focused) const;
 
 private:

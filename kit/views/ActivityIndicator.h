@@ -7,7 +7,7 @@
 
 namespace kit {
 
-/// A spinner: something goes on and its end is not known.
+/// A spinner for work whose end is not known.
 class ActivityIndicator : public View {
 public:
     ActivityIndicator() = default;

@@ -83,7 +83,7 @@ bool Button::press()
 {
     if (!isEnabled() || isHidden())
         return false;
-    // The action may replace itself, or let the button go.
+    // The action may set another action or release the button.
     const auto keepAlive = shared_from_this();
     if (const auto action = _action)
         action();
@@ -125,7 +125,7 @@ void Button::sizeToFit()
     placeTitle();
 }
 
-/// The title stands right of the image, both together in the middle.
+/// Places the title to the right of the image, and centres both together.
 void Button::placeTitle()
 {
     const Size title = _titleLabel->intrinsicContentSize();

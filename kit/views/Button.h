@@ -13,7 +13,7 @@ namespace kit {
 
 enum class ButtonStyle { System, Suggested, Destructive };
 
-/// Something to press.
+/// A button with a title, an image or both.
 class Button : public View {
 public:
     explicit Button(std::string title = {}, std::function<void()> action = {});
@@ -23,7 +23,8 @@ public:
     const std::string& title() const { return _titleLabel->text(); }
     void setTitle(std::string title);
     void setTitleFont(const Font& font);
-    /// The title as a label, in the button's coordinates. It is no subview: a peer draws the title by itself.
+    /// Answers the title as a label, in the button's coordinates. It is no subview, because a peer draws the
+    /// title by itself.
     const std::shared_ptr<Label>& titleLabel() const { return _titleLabel; }
     const std::optional<Image>& image() const { return _image; }
     void setImage(std::optional<Image> image);
@@ -32,9 +33,9 @@ public:
     const EdgeInsets& contentInsets() const { return _contentInsets; } ///< between the edge and the title
     void setContentInsets(const EdgeInsets& insets);
 
-    /// Called once for each press.
+    /// The action is called once for each press.
     void setAction(std::function<void()> action) { _action = std::move(action); }
-    /// Event up: the user pressed the button. False when it is disabled or hidden, and nothing happens then.
+    /// Event up: the user pressed the button. Answers false, and does nothing, when it is disabled or hidden.
     bool press();
 
     Size intrinsicContentSize(double maxWidth = 0) const override;

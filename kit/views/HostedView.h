@@ -11,8 +11,8 @@
 
 namespace kit {
 
-/// A place for a native view that the host makes by its kind ("document", "video", ...), with settings that
-/// the host reads and events that it reports. Without a host it stays empty.
+/// A place for a native view. The host makes the native view by its kind ("document", "video", ...), reads
+/// the settings and reports events. Without a host the place stays empty.
 class HostedView : public View {
 public:
     explicit HostedView(std::string kind, PropertyDictionary settings = {});

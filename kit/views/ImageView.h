@@ -23,7 +23,7 @@ public:
     void setImage(std::optional<Image> image);
     ContentMode contentMode() const { return _contentMode; }
     void setContentMode(ContentMode mode);
-    /// How the image is enlarged; Nearest keeps hard pixel edges.
+    /// Says how the image is enlarged; Nearest keeps hard pixel edges.
     ImageFilter magnification() const { return _magnification; }
     void setMagnification(ImageFilter filter);
 

@@ -12,7 +12,7 @@ namespace kit {
 
 namespace {
 
-// A text that lost a fraction of a pixel would be cut or wrapped.
+// Sizes are rounded up, because a text that lost a fraction of a pixel would be cut or wrapped.
 Size roundedUp(Size size)
 {
     const auto up = [](double points) {

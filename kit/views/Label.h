@@ -11,7 +11,7 @@ namespace kit {
 enum class TextAlignment { Natural, Left, Center, Right };
 enum class LineBreak { WordWrap, TruncateTail, TruncateMiddle };
 
-/// Text that cannot be edited.
+/// Shows text that cannot be edited.
 class Label : public View {
 public:
     explicit Label(std::string text = {});
@@ -19,10 +19,10 @@ public:
     void accept(ViewVisitor& visitor) override;
 
     const std::string& text() const { return _text; }
-    /// Replaces a styled text as well.
+    /// Sets the text; a styled text is dropped.
     void setText(std::string text);
     const std::optional<AttributedText>& attributedText() const { return _attributedText; }
-    /// `text` becomes its characters.
+    /// Sets the styled text; `text()` then answers its characters.
     void setAttributedText(std::optional<AttributedText> text);
 
     const Font& font() const { return _font; }

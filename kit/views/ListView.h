@@ -13,8 +13,8 @@ namespace kit {
 
 enum class SelectionMode { None, Multiple };
 
-/// A column of rows of one height. The rows are values of the data source: whatever their number, only what
-/// is visible costs anything.
+/// A column of rows of one height. The rows are values of the data source. Only visible rows cost anything,
+/// however many there are.
 class ListView : public ScrollView {
 public:
     using ScrollView::ScrollView;
@@ -29,12 +29,12 @@ public:
 
     double rowHeight() const { return _rowHeight; }
     void setRowHeight(double points);
-    /// As of the last reload or change.
+    /// Answers the number of rows as of the last reload or change.
     std::size_t rowCount() const { return _rowCount; }
     ListRow row(std::size_t index) const; ///< with the check mark that the selection gives it
     RowRange visibleRows() const { return _visibleRows; }
 
-    // The data source changed first; these bring the list up to date.
+    // The data source changes first; then these bring the list up to date.
     void reloadAll();
     void apply(const ListChanges& changes);
     void rowChanged(std::size_t index);
@@ -53,17 +53,18 @@ public:
     bool isRefreshing() const { return _refreshing; }
     void endRefreshing();
 
-    // Events up. An index that is past the end, as a late event may bring it, is ignored.
+    // Events up. An index past the end is ignored, because an event may arrive after the rows are gone.
     void activateRow(std::size_t index); ///< opens the row, or toggles it in selection mode
-    /// The range from the row touched last. Out of selection mode the delegate is asked for it first.
+    /// Extends the selection from the row touched last. Out of selection mode the delegate is first asked to
+    /// enter it.
     void extendSelectionTo(std::size_t index);
     void selectAllByUser();
     Menu menuForRow(std::size_t index);
     Menu menuForList();
     bool commandRow(std::size_t index, RowCommand command);
     bool holdRow(std::size_t index);
-    void pressOnHeldRow(); ///< the finger that held a row is still there, and means it
-    /// The row that what was typed leads to, see ListViewDataSource::rowBeginningWith().
+    void pressOnHeldRow(); ///< the finger that held the row pressed on, to open it
+    /// Answers the row that the typed text leads to, see ListViewDataSource::rowBeginningWith().
     std::optional<std::size_t> rowBeginningWith(std::string_view text, std::size_t from) const;
     void pulledToRefresh();
 

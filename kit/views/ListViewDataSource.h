@@ -12,9 +12,9 @@ namespace kit {
 
 class ListView;
 
-/// Answers what a list shows. Asked on the main thread, only for rows that are about to be seen, so an answer
-/// must come from memory: what takes longer is fetched after `visibleRowsDidChange` and told with
-/// `rowChanged`.
+/// Answers the rows of a list. It is asked on the main thread, only for rows that are about to be seen, so an
+/// answer must come from memory. Facts that take longer are fetched after `visibleRowsDidChange` and reported
+/// with `rowChanged`.
 class ListViewDataSource {
 public:
     virtual ~ListViewDataSource() = default;
@@ -22,11 +22,11 @@ public:
     virtual std::size_t numberOfRows(const ListView& list) const = 0;
     /// `index` is below the number of rows.
     virtual ListRow rowAtIndex(const ListView& list, std::size_t index) const = 0;
-    /// The same identifier and kind that `rowAtIndex` answers, without making the row.
+    /// Answers the same identifier and kind as `rowAtIndex`, without making the row.
     virtual RowId rowIdAtIndex(const ListView& list, std::size_t index) const = 0;
     virtual RowKind rowKindAtIndex(const ListView&, std::size_t /*index*/) const { return RowKind::Item; }
-    /// For typing ahead: the first row at or after `from`, and then from the top, whose name begins with a
-    /// text, whatever its case and accents; nothing when none does.
+    /// Serves typing ahead. Answers the first row at or after `from`, and then from the top, whose name
+    /// begins with the text regardless of case and accents, or nothing.
     virtual std::optional<std::size_t> rowBeginningWith(
         const ListView&, std::string_view /*text*/, std::size_t /*from*/) const
     {

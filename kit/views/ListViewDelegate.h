@@ -12,7 +12,7 @@ namespace kit {
 
 class ListView;
 
-/// What the keyboard asks for at a row, beside to open it.
+/// Keys that act on a row, other than the key that opens it.
 enum class RowCommand { Rename, Delete, Info, Peek };
 
 /// Is told what the user does with a list. Main thread only.
@@ -22,27 +22,28 @@ public:
 
     /// An item was tapped while the list was not in selection mode.
     virtual void rowActivated(ListView&, std::size_t /*index*/) { }
-    /// The entries of the menu that a long press or the second mouse button asks for; empty: no menu.
+    /// Answers the entries of the menu that a long press or the second mouse button asks for; empty means no
+    /// menu.
     virtual Menu menuForRow(ListView&, std::size_t /*index*/) { return {}; }
-    /// The entries of the menu for the list itself, away from any row; empty: no menu.
+    /// Answers the entries of the menu for the list itself, away from any row; empty means no menu.
     virtual Menu menuForList(ListView&) { return {}; }
-    /// A key of the row's; false: it means nothing here.
+    /// The user pressed a key that acts on a row. Answers false when the key means nothing here.
     virtual bool rowCommand(ListView&, std::size_t /*index*/, RowCommand) { return false; }
-    /// The user began to select by the keyboard while the list was not in selection mode. Answer by entering
-    /// it, or not at all.
+    /// The user began to select by the keyboard while the list was not in selection mode. The delegate may
+    /// answer by entering selection mode.
     virtual void selectionRequested(ListView&) { }
-    /// Other rows are visible now, or other rows stand there: begin to fetch their details, cancel those of
-    /// the rest.
+    /// Other rows are visible now, or the visible places hold other rows. The delegate begins to fetch their
+    /// details and cancels fetching those of the rest.
     virtual void visibleRowsDidChange(ListView&, RowRange) { }
     /// The user changed the selection.
     virtual void selectionDidChange(ListView&) { }
-    /// The list was pulled down to be refreshed; answer with `ListView::endRefreshing`.
+    /// The user pulled the list down to refresh it. The delegate answers with `ListView::endRefreshing`.
     virtual void refreshRequested(ListView& list);
 
-    /// A row is held: show what it has to say, over the list. False: there is nothing, and the row's menu
-    /// is shown instead.
+    /// The user holds a row, and the delegate shows the row's content over the list. Answers false when there
+    /// is nothing to show, and the row's menu is shown instead.
     virtual bool rowHeld(ListView&, std::size_t /*index*/) { return false; }
-    /// The finger that held a row presses on: open what the row showed.
+    /// The finger that held a row pressed on, and the delegate opens what the row showed.
     virtual void heldRowPressedOn(ListView&) { }
 };
 

@@ -9,8 +9,8 @@
 
 namespace kit {
 
-/// A touch that rests. The handler is called once, while the finger is still down: at the first report,
-/// `held` or `moved`, that comes after the minimum duration.
+/// Recognises a touch that rests. The handler is called once, while the finger is still down: at the first
+/// report, `held` or `moved`, that comes after the minimum duration.
 class LongPressRecognizer : public GestureRecognizer {
 public:
     using GestureRecognizer::GestureRecognizer;
@@ -22,7 +22,8 @@ public:
     void moved(Point point, Time time) override;
     void released(Point point, Time time) override;
     void cancelled() override;
-    /// Time has passed and the finger has not moved. A host with a long-press gesture of its own calls this.
+    /// Reports that time has passed and the finger has not moved. A host with a long-press gesture of its own
+    /// calls this.
     void held(Time time);
 
 private:

@@ -13,7 +13,7 @@ class ScrollView;
 
 enum class Bounce { Never, WhenLarger, Always };
 
-/// What a scroll view lets the user see and do.
+/// Says which indicators a scroll view shows and how it moves at its ends.
 struct ScrollBehavior {
     bool showsHorizontalIndicator = true, showsVerticalIndicator = true;
     Bounce horizontalBounce = Bounce::WhenLarger, verticalBounce = Bounce::WhenLarger;
@@ -24,13 +24,13 @@ struct ScrollBehavior {
 class ScrollObserver {
 public:
     virtual ~ScrollObserver() = default;
-    /// The program scrolls; the offset of the model has changed already.
+    /// The program scrolls. The offset of the model has already changed.
     virtual void scrollTo(ScrollView& view, Point offset, bool animated) = 0;
-    /// Content size, insets or behaviour.
+    /// The content size, the insets or the behaviour has changed.
     virtual void scrollExtentDidChange(ScrollView& view) = 0;
 };
 
-/// A window on content that is larger than the view. The content is placed by frames, from (0, 0) to the
+/// Shows a part of content that is larger than the view. The content is placed by frames, from (0, 0) to the
 /// content size; the offset is the origin of the bounds.
 class ScrollView : public View {
 public:
@@ -51,12 +51,12 @@ public:
 
     Point contentOffset() const { return bounds().origin(); }
     void setContentOffset(Point offset, bool animated = false);
-    /// The smallest scrolling that brings a rectangle of the content into view.
+    /// Scrolls by the least distance that brings a rectangle of the content into view.
     void scrollRectToVisible(const Rect& rect, bool animated);
-    /// Called after every change of the offset, by whomever.
+    /// The callback runs after every change of the offset, by the user or by the program.
     void setOnScroll(std::function<void()> callback) { _onScroll = std::move(callback); }
 
-    /// Event up: the user scrolled there.
+    /// Event up: the user scrolled to an offset.
     void userScrolled(Point offset);
 
 protected:

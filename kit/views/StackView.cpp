@@ -10,7 +10,8 @@ namespace kit {
 
 namespace {
 
-// Only decides what nothing else decides: a stack is as small as its content.
+// A stack is as small as its content. The priority is the lowest one, so that this decides only what no other
+// constraint decides.
 constexpr LayoutPriority asSmallAsPossible = 1;
 
 /// The attributes along and across a stack.

@@ -18,12 +18,12 @@ public:
     const std::vector<std::shared_ptr<View>>& arrangedSubviews() const { return _arranged; }
     void addArrangedSubview(const std::shared_ptr<View>& view);
     void insertArrangedSubview(const std::shared_ptr<View>& view, std::size_t index);
-    /// The view stays a subview, without a place.
+    /// Stops arranging a view, which stays a subview.
     void removeArrangedSubview(const std::shared_ptr<View>& view);
 
     Axis axis() const { return _axis; }
     void setAxis(Axis axis);
-    /// Leading and Trailing are the top and the bottom of a row.
+    /// In a row, Leading means the top and Trailing the bottom.
     StackAlignment stackAlignment() const { return _alignment; }
     void setStackAlignment(StackAlignment alignment);
     StackDistribution distribution() const { return _distribution; }

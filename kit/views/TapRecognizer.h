@@ -9,7 +9,7 @@
 
 namespace kit {
 
-/// A short touch that does not move. The handler is called once, when the finger is lifted.
+/// Recognises a short touch that does not move. The handler is called once, when the finger is lifted.
 class TapRecognizer : public GestureRecognizer {
 public:
     using GestureRecognizer::GestureRecognizer;

@@ -13,7 +13,7 @@ namespace kit {
 
 namespace {
 
-// A field without text still has room for a few characters; the frame of the field takes the rest.
+// An empty field still has room for a few characters. The frame of the field decides the rest.
 constexpr double minimumWidth = 64;
 constexpr double horizontalPadding = 8, verticalPadding = 7;
 
@@ -22,7 +22,7 @@ bool continuesCharacter(char byte)
     return (static_cast<unsigned char>(byte) & 0xC0U) == 0x80U;
 }
 
-/// Where each character begins, and the end of the text.
+/// Answers where each character begins, and the end of the text.
 std::vector<std::size_t> characterStarts(const std::string& text)
 {
     std::vector<std::size_t> starts;
@@ -39,7 +39,7 @@ struct Edit {
     std::string replacement;
 };
 
-/// The one stretch in which two texts differ.
+/// Answers the one range in which two texts differ.
 Edit editBetween(const std::string& before, const std::string& after)
 {
     const auto old = characterStarts(before), now = characterStarts(after);
@@ -153,7 +153,7 @@ bool TextField::resignFirstResponder()
         askForFocus(true);
         return false;
     }
-    // The answer may have taken time in which the editing ended already.
+    // The delegate may have ended the editing itself while it was asked.
     if (!_editing)
         return true;
     _editing = false;

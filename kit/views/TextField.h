@@ -15,7 +15,7 @@ enum class Capitalization { None, Words, Sentences };
 enum class Autocorrection { Default, Off };
 enum class ClearButton { Never, WhileEditing };
 
-/// What the on-screen keyboard and the field's own controls look like.
+/// Says how the on-screen keyboard and the field's own controls look and behave.
 struct TextInputTraits {
     ReturnKey returnKey = ReturnKey::Default;
     bool returnKeyNeedsText = false; ///< the return key works only while the field holds text
@@ -47,22 +47,22 @@ public:
     std::size_t length() const; ///< in characters
 
     void setDelegate(std::weak_ptr<TextFieldDelegate> delegate) { _delegate = std::move(delegate); }
-    /// Called after every edit by the user.
+    /// The callback runs once after every edit by the user.
     void setOnEditingChanged(std::function<void()> callback) { _onEditingChanged = std::move(callback); }
 
     bool isEditing() const { return _editing; }
     bool becomeFirstResponder() override; ///< begins editing when the delegate allows it
     bool resignFirstResponder() override; ///< ends editing when the delegate allows it
 
-    // Events up.
-    /// The field now shows this text with this selection. False: the edit was refused, and the observer is
-    /// told to show the old text again.
+    // Events up: the host reports what the user did.
+    /// The native field now shows this text with this selection. Answers false when the edit was refused; the
+    /// observer is then told to show the old text again.
     bool userEdited(const std::string& text, TextRange selection);
     void userSelected(TextRange selection);
     bool userPressedReturn(); ///< false when the key has no effect, or the delegate refuses
     bool userFocused() { return becomeFirstResponder(); }
-    /// The focus moved elsewhere. False: the end was refused, and the observer is asked to take the focus
-    /// back.
+    /// The focus moved elsewhere. Answers false when the delegate refused to end the editing; the observer is
+    /// then asked to take the focus back.
     bool userLeft() { return resignFirstResponder(); }
 
     Size intrinsicContentSize(double maxWidth = 0) const override;

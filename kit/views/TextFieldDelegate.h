@@ -10,27 +10,27 @@ namespace kit {
 
 class TextField;
 
-/// A stretch of a text in characters (Unicode code points).
+/// A range of a text in characters (Unicode code points).
 struct TextRange {
     std::size_t location = 0;
     std::size_t length = 0;
     bool operator==(const TextRange&) const = default;
 };
 
-/// Is asked and told what happens in a text field. Main thread only.
+/// Is asked and told about the editing of a text field. Main thread only.
 class TextFieldDelegate {
 public:
     virtual ~TextFieldDelegate() = default;
 
     virtual bool textFieldShouldBeginEditing(TextField&) { return true; }
     virtual void textFieldDidBeginEditing(TextField&) { }
-    /// False keeps the field in editing, whatever asked for the end.
+    /// Answering false keeps the field in editing, whoever asked for the end.
     virtual bool textFieldShouldEndEditing(TextField&) { return true; }
     virtual void textFieldDidEndEditing(TextField&) { }
     /// The return key was pressed. The answer says whether the platform's default behaviour may follow; the
     /// kit has none.
     virtual bool textFieldShouldReturn(TextField&) { return true; }
-    /// Asked once for every edit by the user, before the field's text changes; the range is in the old text.
+    /// Asked once for every edit by the user, before the field's text changes. The range is in the old text.
     virtual bool textFieldShouldChangeCharactersInRangeReplacementString(
         TextField&, const TextRange& /*range*/, const std::string& /*replacement*/)
     {

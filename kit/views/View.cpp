@@ -60,7 +60,7 @@ Rect View::convertRect(const Rect& rect, const View& to) const
     return {origin.x, origin.y, rect.width, rect.height};
 }
 
-/// Where the origin of the view's own coordinates lies in those of the root's superview.
+/// Answers where the origin of the view's own coordinates lies in those of the root's superview.
 Point View::originInRoot() const
 {
     Point origin;

@@ -23,7 +23,7 @@ class ViewOwner;
 class ViewVisitor;
 class Window;
 
-/// How a view is painted. Lengths are points.
+/// Says how a view is painted. Lengths are points.
 struct ViewStyle {
     std::optional<Color> background;
     double borderWidth = 0;
@@ -33,7 +33,7 @@ struct ViewStyle {
     bool operator==(const ViewStyle&) const = default;
 };
 
-/// What assistive technology reads.
+/// The texts that assistive technology reads.
 struct Accessibility {
     std::string label; ///< empty: the text that the view shows
     std::string hint;
@@ -51,14 +51,14 @@ public:
     virtual void accept(ViewVisitor& visitor);
     void setObserver(std::weak_ptr<ViewObserver> observer) { _observer.set(std::move(observer)); }
 
-    // Geometry: the frame is in the superview's coordinates, the bounds in the view's own. Points.
+    // The frame is in the superview's coordinates, the bounds are in the view's own. Lengths are points.
     const Rect& frame() const override { return _frame; }
     void setFrame(const Rect& frame) override;
     Rect bounds() const { return {_boundsOrigin.x, _boundsOrigin.y, _frame.width, _frame.height}; }
     Point convertPoint(Point point, const View& to) const; ///< both in one tree
     Rect convertRect(const Rect& rect, const View& to) const;
 
-    // The tree. Later subviews lie in front.
+    // The tree. Later subviews lie in front of earlier ones.
     std::shared_ptr<View> superview() const { return _superview.lock(); }
     const std::vector<std::shared_ptr<View>>& subviews() const { return _subviews; }
     void addSubview(const std::shared_ptr<View>& view);
@@ -69,9 +69,9 @@ public:
     std::vector<std::shared_ptr<LayoutItem>> layoutChildren() const override;
     bool isDescendantOf(const View& view) const { return isInside(view); } ///< a view is its own descendant
     std::shared_ptr<Window> window() const;
-    /// The window's affair, for the root view of a shown screen.
+    /// The window calls this on the root view of a shown screen.
     void setWindow(std::weak_ptr<Window> window) { _window = std::move(window); }
-    /// The screen's affair, for its root view.
+    /// The screen calls this on its root view.
     void setOwner(std::weak_ptr<ViewOwner> owner) { _owner = std::move(owner); }
     const TraitCollection& traits() const; ///< the nearest override, else the application's
     void overrideTraits(std::optional<TraitCollection> traits);

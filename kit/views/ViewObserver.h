@@ -13,7 +13,7 @@ namespace kit {
 
 class View;
 
-/// What of a view has changed.
+/// Says which side of a view has changed.
 enum class ViewChange : std::uint32_t {
     Frame = 1U << 0,
     Bounds = 1U << 1, ///< the origin of the bounds: the content was scrolled
@@ -60,19 +60,20 @@ constexpr ViewChanges operator|(ViewChange a, ViewChange b)
     return ViewChanges(a) | b;
 }
 
-/// Calls down: what the kit tells the peer of a view. Called on the main thread, at once at every change, so
-/// a peer gathers the changes and mirrors them once a frame. Must not change the model.
+/// Calls down that the kit makes to the peer of a view. They come on the main thread, at once at every
+/// change, so a peer gathers the changes and mirrors them once a frame. The observer must not change the
+/// model.
 class ViewObserver {
 public:
     virtual ~ViewObserver() = default;
 
     virtual void viewDidChange(View& view, ViewChanges changes) = 0;
 
-    /// The view asks for the keyboard focus, or to be rid of it.
+    /// The view asks to get the keyboard focus or to lose it.
     virtual void viewWantsFocus(View& view, bool focus);
 
-    /// The size that the native widget needs for its content, in points, where it is at most `maxWidth` wide
-    /// (0: any width). Nothing: the kit measures by itself.
+    /// Answers the size in points that the native widget needs for its content where it is at most `maxWidth`
+    /// wide (0: any width). When it answers nothing, the kit measures by itself.
     virtual std::optional<Size> nativeSize(const View& view, double maxWidth);
 };
 

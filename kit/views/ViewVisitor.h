@@ -15,8 +15,8 @@ class ScrollView;
 class TextField;
 class View;
 
-/// Tells the kinds of view apart without casts: `view.accept(visitor)` calls the operation of the nearest
-/// kind. A view of one's own that derives from a kind is visited as that kind; stack views are plain views.
+/// Tells the classes of views apart without casts: `view.accept(visitor)` calls the operation of the nearest
+/// class. A view of a derived class is visited as its base class; stack views are visited as plain views.
 class ViewVisitor {
 public:
     virtual ~ViewVisitor() = default;
