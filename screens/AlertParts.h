@@ -11,10 +11,10 @@
 
 namespace screens {
 
-/// A button of an alert that does something, or nothing but to close it.
+/// Answers a button of an alert. Without `act` it only closes the alert.
 std::shared_ptr<kit::AlertAction> alertAction(
     std::string title, kit::AlertActionStyle style, std::function<void()> act = {});
-/// A message that is closed with OK.
+/// Answers an alert with a message and an OK button.
 std::shared_ptr<kit::AlertController> messageAlert(const std::string& title, const std::string& words);
 
 } // namespace screens

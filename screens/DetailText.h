@@ -7,11 +7,12 @@
 
 namespace screens {
 
-/// Two parts of a line of details in the order and with the mark that the language has for it, such as
-/// "Nov 23, 2026 · 5 KB". An empty part and the mark are left out.
+/// Answers two parts of a line of details in the order and with the separator of the user's language, such as
+/// "Nov 23, 2026 · 5 KB". An empty part is left out, and the separator with it.
 std::string joinedDetails(const std::string& first, const std::string& second);
 
-/// A folder and one in it as a place, such as "Documents › Letters". Empty ones as above.
+/// Answers a folder and one inside it as a place, such as "Documents › Letters". An empty part is left out as
+/// above.
 std::string joinedPlace(const std::string& folder, const std::string& inner);
 
 } // namespace screens

@@ -30,7 +30,7 @@ bool isControl(char c)
     return byte < 0x20 || byte == 0x7F;
 }
 
-/// The number of bytes of the character that a text begins with; 0 when it begins with none.
+/// Answers the number of bytes of a text's first character, or 0 when it does not begin with a valid one.
 std::size_t leadingCharacter(std::string_view text)
 {
     for (std::size_t length = 1; length <= std::min<std::size_t>(4, text.size()); ++length) {

@@ -8,12 +8,12 @@
 
 namespace screens {
 
-/// A file name as text for the screen: bytes that are no UTF-8 show as the replacement character, as does
-/// what turns the direction of the text and so could disguise an extension; control characters show as a
-/// blank.
+/// Answers a file name as text for the screen. Bytes that are not UTF-8 become the replacement character. So
+/// do the characters that change the direction of text, because they could disguise an extension. Control
+/// characters become a blank.
 std::string displayName(std::string_view bytes);
 
-/// The extension of a name without its dot; empty for none.
+/// Answers the extension of a name without its dot, or an empty text when it has none.
 std::string_view nameExtension(std::string_view name);
 
 } // namespace screens

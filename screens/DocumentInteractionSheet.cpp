@@ -22,7 +22,8 @@ using kit::AlertAction;
 using kit::AlertActionStyle;
 using kit::AlertController;
 
-/// The apps that work on a document where it lies, this program left out, those that own its type first.
+/// Answers the apps that can open a document in its place, without this program. Apps that own the document's
+/// type come first.
 std::vector<AppHandle> appsFor(const Url& document)
 {
     const auto& registry = services().appRegistry();

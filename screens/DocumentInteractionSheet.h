@@ -27,30 +27,30 @@ namespace screens {
 
 class DocumentInteractionSheet;
 
-/// Is told when the sheet has gone. Main thread only.
+/// Is told when the sheet has closed. Main thread only.
 class DocumentInteractionSheetDelegate {
 public:
     virtual ~DocumentInteractionSheetDelegate() = default;
-    /// Called once after each menu that was shown, whatever was chosen in it.
+    /// Called once after each menu that was shown, whatever the user chose in it.
     virtual void documentInteractionControllerDidDismissOptionsMenu(
         const std::shared_ptr<DocumentInteractionSheet>&)
     {
     }
 };
 
-/// What can be done with one item outside the drive: open it in an app, send it, copy its path or a link to
-/// it, show it in the file manager, print it. What needs the content is offered only where that is
-/// downloaded. Whoever shows the menu keeps the sheet until it is dismissed. Main thread only.
+/// The menu of actions on one item outside the drive: open it in an app, send it, copy its path or a link to
+/// it, show it in the file manager, print it. Actions that need the content are offered only when it is
+/// downloaded. The caller that shows the menu keeps the sheet until it is dismissed. Main thread only.
 class DocumentInteractionSheet : public std::enable_shared_from_this<DocumentInteractionSheet> {
 public:
-    /// Apps that have a line of their own in the menu; further ones stand behind a line "Other Apps…".
+    /// So many apps have a line of their own in the menu; further ones stand behind a line "Other Apps…".
     static constexpr std::size_t directApps = 3;
 
     static std::shared_ptr<DocumentInteractionSheet> interactionControllerWithURL(const Url& url);
     explicit DocumentInteractionSheet(Url url);
 
     const Url& url() const { return _url; }
-    /// The heading of the menu; the item's display name until it is set.
+    /// The heading of the menu. It is the item's display name until another one is set.
     const std::string& name() const { return _name; }
     void setName(std::string name) { _name = std::move(name); }
     void setDelegate(std::weak_ptr<DocumentInteractionSheetDelegate> delegate)
@@ -58,14 +58,14 @@ public:
         _delegate = std::move(delegate);
     }
 
-    /// Has an app open the document where it lies. False when the content is not here or the app cannot be
-    /// started.
+    /// Asks an app to open the document in its place. Answers false when the content is not downloaded or the
+    /// app cannot be started.
     bool openDocumentInPlaceInApp(const AppHandle& app) const;
 
     /// Shows the menu over a screen, pointing at a rectangle of a view.
     void presentOptionsMenuFromRectInView(const std::shared_ptr<kit::ViewController>& presenter,
         const Rect& rect, const std::shared_ptr<kit::View>& view, bool animated);
-    /// The same, pointing at a button of a bar.
+    /// Shows the menu over a screen, pointing at a button of a bar.
     void presentOptionsMenuFromBarButtonItem(const std::shared_ptr<kit::ViewController>& presenter,
         const std::shared_ptr<kit::BarButtonItem>& item, bool animated);
 

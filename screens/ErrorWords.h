@@ -10,10 +10,11 @@
 
 namespace screens {
 
-/// Why something cannot be shown, in a sentence for the person: the error's own words where it has some.
+/// Answers a sentence that tells the user why something cannot be shown. It is the error's own text where it
+/// has one.
 std::string errorWords(const Error& error);
 
-/// Whether an error says that the item is not there any more.
+/// Answers whether an error says that the item does not exist any more.
 bool saysItemIsGone(const Error& error);
 
 } // namespace screens

@@ -13,25 +13,27 @@
 
 namespace screens {
 
-/// The documents folder of the default container, the drive's top level; nothing when there is none.
+/// Answers the documents folder of the default container, which is the drive's top level, or nothing when
+/// there is none.
 std::optional<Url> rootFolder();
 
-/// What a folder's list is called: a container's documents folder after its container.
+/// Answers the title of a folder's list. A container's documents folder has the container's name.
 std::string folderTitle(const Url& folder);
 
-/// Where an item lies, in words: the titles of the folders that lead to it, the drive's top level left out
-/// but for items that lie right there.
+/// Answers the place of an item in words: the titles of the folders that lead to it. The drive's top level is
+/// left out, except for items that lie directly in it.
 std::string placeText(const Url& item);
 
-/// The folders that a search looks through: the documents folders of all containers.
+/// Answers the folders that a search looks through, which are the documents folders of all containers.
 std::vector<Url> searchableFolders();
 
-/// What a folder's list shows beside the folder's own items: at the drive's top level the app libraries.
+/// Answers the items that a folder's list shows beside the folder's own ones. At the drive's top level these
+/// are the app libraries.
 std::vector<FolderSnapshot::ExtraItem> extraItemsOf(const Url& folder);
 
-/// The folders from the drive's top level down to a folder, that one included; through a library its
-/// documents folder comes second. Empty when the folder lies neither in the default container nor in a
-/// library.
+/// Answers the folders from the drive's top level down to a folder, that folder included. On the way through
+/// a library, its documents folder comes second. Answers nothing when the folder lies neither in the default
+/// container nor in a library.
 std::vector<Url> foldersDownTo(const Url& folder);
 
 } // namespace screens

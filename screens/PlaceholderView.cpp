@@ -18,7 +18,8 @@ namespace {
 
 constexpr double margin = 24;
 constexpr double lineSpacing = 12;
-/// Of a plain symbol: what is said is in the words. An icon in colour is what the screen is about.
+/// A plain symbol is pale because the words carry the message. An icon in colour is what the screen is about
+/// and is not pale.
 constexpr double symbolAlpha = 0.5;
 
 std::shared_ptr<kit::Label> makeLabel(const kit::Font& font)

@@ -17,21 +17,21 @@ class StackView;
 
 namespace screens {
 
-/// What a screen shows in place of content: an icon, what is the matter, and what to do about it, centred and
-/// never wider than it can be read. Main thread only.
+/// Stands in for missing content: an icon, a title that says what happened and a message that says what to
+/// do, centred and not wider than a comfortable line of text. Main thread only.
 class PlaceholderView : public kit::View {
 public:
     struct Content {
-        std::string iconName{}; ///< of the icon theme; empty: none
+        std::string iconName{}; ///< name of an icon in the icon theme; empty: none
         std::string title{}; ///< empty: none
         std::string message{}; ///< empty: none
-        bool isBusy = false; ///< with a spinner in place of the icon
+        bool isBusy = false; ///< shows a spinner in place of the icon
         bool operator==(const Content&) const = default;
     };
 
     static std::shared_ptr<PlaceholderView> create();
 
-    static constexpr double maximumWidth = 420; ///< points, of the text
+    static constexpr double maximumWidth = 420; ///< points; the width of the text
     static constexpr double iconSide = 96; ///< points
 
     using kit::View::View;

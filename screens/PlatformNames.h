@@ -6,7 +6,7 @@
 namespace platform {
 }
 
-/// The screens call the platform's services and values by their own names.
+/// The screens use the names of the platform's services and values without a prefix.
 namespace screens {
 
 using namespace platform;

@@ -11,7 +11,7 @@
 
 namespace screens {
 
-/// Where a storage upgrade button leads.
+/// The target of a storage upgrade button.
 class StorageUpgradeLink {
 public:
     explicit StorageUpgradeLink(StorageOfferLink link)
@@ -19,28 +19,28 @@ public:
     {
     }
 
-    /// StorageOfferLink::actionUpgradeInApplication leaves the upgrade to the application.
+    /// The value StorageOfferLink::actionUpgradeInApplication leaves the upgrade to the application.
     int action() const { return _link.action; }
-    /// Performs what the link does by itself; false when it does nothing by itself.
+    /// Performs the link's default action. Answers false when the link has none.
     bool performDefaultAction() const;
 
 private:
     StorageOfferLink _link;
 };
 
-/// The button that leads to more storage. Main thread only.
+/// A button that leads to an offer of more storage. Main thread only.
 class StorageUpgradeButton : public kit::Button {
 public:
     static std::shared_ptr<StorageUpgradeButton> createButton();
-    /// Whether the button should be shown for an offer: when storage is running low.
+    /// Answers whether the button should be shown for an offer, which is so when storage is running low.
     static bool shouldShowForOffer(const std::shared_ptr<const StorageOffer>& offer);
 
     StorageUpgradeButton();
 
     const std::shared_ptr<const StorageOffer>& offer() const { return _offer; }
-    /// Null: no offer, the button has its plain title.
+    /// Sets the offer. Without one (null) the button has its plain title.
     void setOffer(std::shared_ptr<const StorageOffer> offer);
-    /// The offer's link; without an offer, one that does nothing.
+    /// Answers the offer's link, or a link that does nothing when there is no offer.
     StorageUpgradeLink link() const;
 
 private:

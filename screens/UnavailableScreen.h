@@ -9,7 +9,7 @@
 
 namespace screens {
 
-/// What is shown while the drive cannot be used because nobody is signed in: what happened and what to do.
+/// Is shown while the drive cannot be used because nobody is signed in. It says what happened and what to do.
 class UnavailableScreen : public kit::ViewController {
 public:
     static std::shared_ptr<UnavailableScreen> create();

@@ -14,7 +14,7 @@ class ViewController;
 
 namespace screens {
 
-/// Leads from a storage offer to the page where it can be taken up. Main thread only.
+/// Leads from a storage offer to the page where the user can accept it. Main thread only.
 class UpgradeFlow : public std::enable_shared_from_this<UpgradeFlow> {
 public:
     /// Without an offer the flow does nothing.
@@ -25,7 +25,7 @@ public:
     {
     }
 
-    /// Shows the offer over a screen. Whoever began the flow keeps it until the offer is dismissed.
+    /// Shows the offer over a screen. The caller keeps the flow alive until the offer is dismissed.
     void beginWithPresentingViewController(const std::shared_ptr<kit::ViewController>& presenter);
 
 private:

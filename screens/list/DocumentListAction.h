@@ -5,7 +5,7 @@
 
 namespace screens {
 
-/// What a folder list offers for one item, with the codes that it reports.
+/// The actions that a folder list offers for one item, with the codes that it reports.
 enum class DocumentListAction : int {
     Delete = 0,
     More = 1,

@@ -179,7 +179,7 @@ kit::MenuAction DocumentListController::downloadEntry(const Url& url)
         .image = {}};
 }
 
-/// Goes on when the list is left: only a failure is told in the list.
+/// Downloads an item. The download goes on when the user leaves the list; the list reports only a failure.
 void DocumentListController::download(const Url& url)
 {
     services().cloudDocumentService().items().download(

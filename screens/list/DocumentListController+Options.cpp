@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// The order of a list, and the menu in which it is chosen.
+// This file holds the order of a list and the menu in which the user chooses it.
 
 #include "platform/Localization.h"
 #include "screens/PlatformNames.h"

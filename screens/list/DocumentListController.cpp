@@ -24,7 +24,7 @@ namespace screens {
 
 namespace {
 
-/// A folder that is listed sooner never shows that it was loading.
+/// The list shows that it is loading only after this time, because a short flash would disturb.
 constexpr auto loadingDelay = std::chrono::milliseconds(300);
 constexpr auto librarySettles = std::chrono::seconds(1);
 
@@ -126,7 +126,8 @@ void DocumentListController::viewDidLoad()
 
 void DocumentListController::takeKeyboard()
 {
-    // A list in a peek leaves the keyboard to the peek, one under a search or a question to that.
+    // The list takes the keyboard focus only on top of its stack: a list in a peek leaves it to the peek, and
+    // a list under a search or an alert leaves it to that.
     const auto stack = navigationController();
     const bool isOnTop = stack && stack->topViewController().get() == this && !presentedViewController();
     if (_hasTakenKeyboard || !isOnTop || appearanceState() != kit::AppearanceState::Appeared
@@ -138,11 +139,12 @@ void DocumentListController::takeKeyboard()
 
 void DocumentListController::offerSearch()
 {
-    // While items are chosen a result could not be opened, and a narrow bar has no room to spare.
+    // The search button goes while the user selects items, because a result could not be opened then and a
+    // narrow bar has no room to spare.
     if (!shouldShowSearch() || _editing)
         return navigationItem().setSearchAction({});
     navigationItem().setSearchAction([weak = std::weak_ptr(self())] {
-        // A key reaches the button also while something lies over the list.
+        // A shortcut triggers the button also while another screen lies over the list.
         if (const auto list = weak.lock(); list && !list->presentedViewController())
             list->startSearchWithQueryStringBecomeFirstResponder({}, true);
     });
@@ -166,7 +168,7 @@ void DocumentListController::followLibraries()
             if (!list)
                 return;
             list->librariesMayHaveChanged();
-            // What a library is called may be written after its folder.
+            // A library's name may be written to the disk after its folder.
             auto& dispatch = services().dispatch();
             dispatch.after(librarySettles, dispatch.mainQueue(), [weak] {
                 if (const auto later = weak.lock())
@@ -186,12 +188,12 @@ void DocumentListController::viewDidAppear(bool animated)
     kit::ViewController::viewDidAppear(animated);
     _hasTakenKeyboard = false;
     takeKeyboard();
-    // The folders in it may hold something else since they were looked at.
+    // The subfolders may have got or lost items since the list was last shown.
     if (_rows) {
         _rows->invalidateDetails(std::vector<kit::RowId>());
         _rows->visibleRowsDidChange();
     }
-    // The delegate takes the list off the stack, which must not happen while the stack is still moving.
+    // The delegate takes the list off the stack, which must not happen while the stack is still changing.
     if (_wasRemoved)
         services().dispatch().mainQueue()->async([weak = std::weak_ptr(self())] {
             if (const auto list = weak.lock())
@@ -207,7 +209,7 @@ void DocumentListController::contentsDidChange(const FolderContentsUpdate& updat
     _rows->setRows(update.rows);
     _rows->invalidateDetails(update.touched);
     if (std::exchange(_isReordered, false)) {
-        // Nearly every row has moved: one begins at the top again.
+        // Nearly every row has moved, so the list scrolls to the top.
         _hasTakenKeyboard = false;
         _listView->reloadAll();
         _listView->scrollToRow(0, kit::RowPosition::Top, false);

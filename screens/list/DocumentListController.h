@@ -36,19 +36,19 @@ class FolderContents;
 class PlaceholderView;
 struct FolderContentsUpdate;
 
-/// The screen that shows one folder of the drive. It begins to list the folder when its view is loaded and
-/// follows every change from then on. Main thread only; nothing that could wait is done there.
+/// The screen that shows one folder of the drive. It begins to list the folder when its view is loaded, and
+/// follows every change from then on. Main thread only; slow work runs on other threads.
 class DocumentListController : public kit::ViewController, private kit::ListViewDelegate {
 public:
-    /// The list of the drive's top level, which shows the app libraries as well; null when there is no
-    /// default container (signed out).
+    /// Answers the list of the drive's top level, which shows the app libraries as well, or null when there
+    /// is no default container because nobody is signed in.
     static std::shared_ptr<DocumentListController> createRootList();
     static std::shared_ptr<DocumentListController> initWithURL(const Url& url);
-    /// The lists from the drive's top level down to a folder, in this order, each of its own; empty when the
-    /// folder does not lie in the default container or in an app library.
+    /// Answers a new list for each folder from the drive's top level down to the given one, in this order.
+    /// Answers nothing when the folder lies neither in the default container nor in an app library.
     static std::vector<std::shared_ptr<DocumentListController>> hierarchyForURL(const Url& url);
 
-    /// For derived lists; without a folder the list stays empty.
+    /// Derived classes call this. Without a folder the list stays empty.
     explicit DocumentListController(std::optional<Url> folder);
     ~DocumentListController() override;
 
@@ -56,52 +56,54 @@ public:
     std::shared_ptr<DocumentListControllerDelegate> delegate() const { return _delegate.lock(); }
 
     const std::optional<Url>& presentedURL() const { return _presentedURL; }
-    /// Makes a URL for every item: for 100,000 items that is a lot; ask for the count where that is enough.
+    /// Answers the URLs of all items. Making 100,000 URLs is expensive; use `containedItemCount` where the
+    /// number is enough.
     std::vector<Url> containedItems() const;
-    /// The number of items listed so far.
+    /// Answers the number of items listed so far.
     std::size_t containedItemCount() const;
 
-    /// In the order of the list.
+    /// Answers the URLs of the selected items in the order of the list.
     std::vector<Url> selectedItems() const;
     std::size_t selectedItemCount() const;
-    /// URLs that are no items of the list are ignored. Only an editing list selects.
+    /// Selects items. URLs that are not items of the list are ignored. Only an editing list selects.
     void setSelectedItems(const std::vector<Url>& items);
 
-    /// Selects every item, which makes no URL; the delegate is told.
+    /// Selects every item without making URLs, and tells the delegate.
     void selectAllItems();
     void deselectAllItems();
 
     bool editing() const { return _editing; }
-    /// While editing, taps toggle check marks and nothing is opened. Leaving it clears the selection.
+    /// While the list is editing, taps toggle check marks and nothing is opened. Leaving editing clears the
+    /// selection.
     void setEditingAnimated(bool editing, bool animated);
 
-    /// The actions that an item's menu offers; none at first.
+    /// The actions that an item's menu offers. There are none at first.
     DocumentListActionSet availableActions() const { return _availableActions; }
     void setAvailableActions(DocumentListActionSet actions) { _availableActions = actions; }
 
-    /// Presents the search field with a query, over the list; with `becomeFirstResponder` it takes the
-    /// keyboard. Searches the names of this list's items.
+    /// Presents the search field with a query over the list. With `becomeFirstResponder` the field takes the
+    /// keyboard focus. The search looks through the names of the whole drive.
     void startSearchWithQueryStringBecomeFirstResponder(const std::string& query, bool becomeFirstResponder);
-    /// Whether the list offers a search field of its own.
+    /// Answers whether the list offers a search field of its own.
     virtual bool shouldShowSearch() const { return true; }
 
-    /// Runs an action that opens a document outside the program once what must be asked first was answered;
-    /// nothing needs to be asked here, so the action runs at once.
+    /// Runs an action that opens a document outside the program, after the questions that must be asked
+    /// first. There are none here, so the action runs at once.
     static void openOutOfDriveViewControllerAction(const Url& document,
         const std::shared_ptr<kit::ViewController>& viewController, const std::function<void()>& action);
 
-    /// Lists the folder anew.
+    /// Lists the folder again.
     void refresh();
 
-    /// The order of the items; once the view is loaded the user's choice for this folder.
+    /// The order of the items. When the view is loaded it becomes the user's choice for this folder.
     const ListOrder& order() const { return _order; }
-    /// Shows another order and keeps it for the folder.
+    /// Shows the items in another order and saves that order for the folder.
     void setOrder(const ListOrder& order);
-    /// The choices of order, and while editing what can be selected at once.
+    /// Answers the menu of orders and, while the list is editing, of selections.
     kit::Menu optionsMenu();
 
-    /// Objects that others attach to the list, kept as long as it lives; null removes. Ask with the type that
-    /// was attached.
+    /// Other classes attach objects to the list, which keeps them as long as it lives; null removes one. The
+    /// object is answered only for the type with which it was attached.
     void setAssociatedObject(const std::string& key, std::shared_ptr<void> object);
     template <typename T>
     std::shared_ptr<T> associatedObject(const std::string& key) const
@@ -134,7 +136,7 @@ private:
     void contentsDidChange(const FolderContentsUpdate& update);
     void showStateOfFolder();
     void offerSearch();
-    /// Once for each appearance, as soon as there are rows.
+    /// Takes the keyboard focus once for each appearance, as soon as there are rows.
     void takeKeyboard();
     void followLibraries();
     void librariesMayHaveChanged();
@@ -144,34 +146,35 @@ private:
     void perform(DocumentListAction action, const Url& url);
     kit::MenuAction downloadEntry(const Url& url);
     void download(const Url& url);
-    /// The place of an item's row, for what points there; the list's when the row is not seen.
+    /// Answers the place of an item's row for a popover, or the list itself when the row is not visible.
     std::shared_ptr<kit::View> anchorFor(const Url& url);
     void openFromPeek(const Url& url, FolderEntryKind kind);
-    /// Whether an item may be done something to: the action is enabled, and its kind of item has it.
+    /// Answers whether an action is enabled and applies to this kind of item.
     bool offers(DocumentListAction action, FolderEntryKind kind) const;
 
     std::optional<Url> _presentedURL;
-    std::weak_ptr<kit::AlertController> _peek; ///< the latest
+    std::weak_ptr<kit::AlertController> _peek; ///< the latest peek
     std::weak_ptr<DocumentListControllerDelegate> _delegate;
     std::shared_ptr<kit::ListView> _listView;
     std::shared_ptr<PlaceholderView> _placeholder;
-    std::shared_ptr<kit::View> _rowAnchor; ///< never seen
+    std::shared_ptr<kit::View> _rowAnchor; ///< an invisible view at the place of a row, for popovers
     std::shared_ptr<DocumentRowSource> _rows;
     std::shared_ptr<FolderContents> _contents;
     std::shared_ptr<DocumentSearch> _search;
-    std::shared_ptr<FolderListing> _libraries; ///< of the drive's top level: tells when libraries come or go
+    std::shared_ptr<FolderListing>
+        _libraries; ///< the drive's top level; it reports libraries that come or go
     std::vector<FolderSnapshot::ExtraItem> _shownLibraries;
     std::map<std::string, std::shared_ptr<void>> _associatedObjects;
     DocumentListActionSet _availableActions = 0;
     ListOrder _order;
     bool _editing = false;
-    std::optional<ListingStage> _state; ///< of the latest update; nothing before the first
+    std::optional<ListingStage> _state; ///< the stage of the latest update; absent before the first
     std::optional<Error> _failure;
     bool _wasRemoved = false, _reportedRemoval = false, _hasTakenKeyboard = false;
     bool _isReordered = false; ///< the next update brings another order
 };
 
-/// How a list reads in a log line.
+/// Answers the text that stands for a list in a log line.
 std::string logText(const std::shared_ptr<DocumentListController>& list);
 
 } // namespace screens

@@ -29,30 +29,31 @@ public:
 
     virtual ~DocumentListControllerDelegate() = default;
 
-    /// A folder or a library was tapped; `container` is a new list of it, which nothing shows yet.
+    /// The user tapped a folder or a library. `container` is a new list of it that is not on the screen yet.
     virtual void documentListControllerDidSelectContainerWithViewController(
         const List& list, const List& container) = 0;
-    /// A document, a package or a link was tapped.
+    /// The user tapped a document, a package or a link.
     virtual void documentListControllerDidSelectItemAtURL(const List& list, const Url& url) = 0;
 
-    /// The list's items or its selection have changed; also called once when the first listing is complete.
+    /// The list's items or its selection have changed. Also called once when the first listing is complete.
     virtual void documentListControllerItemsChanged(const List&) { }
-    /// The folder that the list shows is gone. Called once, and only while the list is shown.
+    /// The folder that the list shows was deleted or moved away. Called once, and only while the list is
+    /// shown.
     virtual void documentListControllerURLWasRemoved(const List&) { }
 
-    /// The user began to choose several items by the keyboard (select all, a range): enter edit mode if it is
-    /// offered. The list goes on once it is editing.
+    /// The user began to select several items by the keyboard (select all, a range). The delegate may enter
+    /// edit mode; the list selects them once it is editing.
     virtual void documentListControllerRequestsEditing(const List&) { }
 
-    /// The screen for a peek at an item; null: none.
+    /// Answers the screen for a peek at an item, or null for none.
     virtual std::shared_ptr<kit::ViewController> documentListControllerViewControllerForPreviewingItemAtURL(
         const List&, const Url&)
     {
         return nullptr;
     }
 
-    /// The user chose an action of an item; `action` is a code of DocumentListAction. The view is where a
-    /// popover may point (null: nowhere); the completion is to be called when the action has ended.
+    /// The user chose an action of an item. `action` is a code of DocumentListAction. A popover may point at
+    /// the view (null: nowhere). The delegate calls the completion when the action has ended.
     virtual void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,
         const Url& url, const std::shared_ptr<kit::View>& /*originatingView*/, const Completion& completion)
     {
@@ -60,10 +61,10 @@ public:
         if (completion)
             completion();
     }
-    /// The older form, for a delegate that needs neither the view nor the completion.
+    /// An older form, for a delegate that needs neither the view nor the completion.
     virtual void documentListControllerPerformActionURL(const List&, int /*action*/, const Url&) { }
 
-    /// The dots for an item's tags, one for each name that has a colour.
+    /// Answers the dots for an item's tags, one for each name that has a colour.
     virtual std::vector<Color> documentListControllerColorsForTagNames(
         const List& list, const std::vector<std::string>& names);
 };

@@ -43,7 +43,7 @@ public:
     /// Called when the miniature is tapped.
     void setOnTap(std::function<void()> onTap) { _onTap = std::move(onTap); }
 
-    /// Lets the screen go, so that it can be shown elsewhere.
+    /// Releases the screen, so that it can be shown elsewhere.
     void release()
     {
         if (_screen->isViewLoaded())
@@ -52,7 +52,7 @@ public:
     }
 
 private:
-    /// A pane that takes the taps, so that a miniature opens as a whole.
+    /// Covers the screen with a pane that takes the taps, so that a tap anywhere opens the item.
     void coverBy(const std::shared_ptr<kit::View>& place)
     {
         const auto pane = std::make_shared<kit::View>();

@@ -16,14 +16,14 @@ class ViewController;
 
 namespace screens {
 
-/// A look at an item without leaving the list: a small living picture of its screen above what can be done
-/// with it. The return key opens it, Escape and a tap beside it put it away.
+/// Shows an item without leaving the list: a small live picture of its screen above the item's actions. The
+/// return key opens the item; Escape and a tap beside the peek close it.
 namespace DocumentPeek {
 
 inline constexpr double miniatureHeight = 260; ///< points
 
-/// `open` is called once the peek has closed and no longer holds the screen, which may then be shown
-/// elsewhere. Present what is answered; main thread.
+/// Answers the alert to present. `open` is called once, after the peek has closed and released the screen,
+/// which may then be shown elsewhere. Main thread.
 std::shared_ptr<kit::AlertController> make(const std::string& title,
     const std::shared_ptr<kit::ViewController>& screen, const kit::Menu& actions, std::function<void()> open);
 

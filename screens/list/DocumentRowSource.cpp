@@ -154,7 +154,7 @@ Image DocumentRowSource::iconFor(std::size_t index, const FolderEntry& entry) co
     if (opensAsFolder(entry.kind))
         return Image::named(folderIcon);
     const auto& icon = documentIcon(entry.name);
-    // A link that its name gives no type of its own shows that it is one.
+    // A link whose name has no known type shows the icon of links.
     const bool isPlainLink = entry.kind == FolderEntryKind::Link && icon == plainDocumentIcon;
     return Image::named(isPlainLink ? linkIcon : icon);
 }
@@ -183,7 +183,7 @@ const std::string& DocumentRowSource::documentKind(std::string_view name) const
     return _kindsByExtension.emplace(extension, std::move(described)).first->second;
 }
 
-/// What kind of item a row stands for, to be said beside its name.
+/// Answers the kind of item that a screen reader says beside its name.
 std::string DocumentRowSource::spokenKind(const FolderEntry& entry) const
 {
     switch (entry.kind) {

@@ -23,33 +23,35 @@ class ListView;
 
 namespace screens {
 
-/// Makes the rows of a document list from what the listing knows, and completes them with details that are
-/// fetched while they are visible. Main thread only.
+/// Makes the rows of a document list from the listing, and completes them with details that are fetched while
+/// they are visible. Main thread only.
 class DocumentRowSource : public kit::ListViewDataSource,
                           public std::enable_shared_from_this<DocumentRowSource> {
 public:
-    /// The dots for tags; called on the main thread for rows that are about to be seen.
+    /// Answers the dots for tags. Called on the main thread for rows that are about to be seen.
     using TagColors = std::function<std::vector<Color>(const std::vector<std::string>& names)>;
 
-    /// Details of this many rows are kept; beyond, those that are not visible go.
+    /// Details of so many rows are kept. Beyond that, those of invisible rows are dropped.
     static constexpr std::size_t keptDetails = 600;
 
     static std::shared_ptr<DocumentRowSource> create(const std::shared_ptr<kit::ListView>& list);
     explicit DocumentRowSource(const std::shared_ptr<kit::ListView>& list);
 
     const std::shared_ptr<const DocumentRows>& rows() const { return _rows; }
-    /// The list has to be told the difference by the caller.
+    /// Sets the rows. The caller tells the list the difference.
     void setRows(std::shared_ptr<const DocumentRows> rows) { _rows = std::move(rows); }
     void setTagColors(TagColors tagColors) { _tagColors = std::move(tagColors); }
 
-    /// Where an item lies, said before its details; none at first. Called for rows that are about to be seen.
+    /// Answers the place of an item, which its row shows before the details; none at first. Called on the
+    /// main thread for rows that are about to be seen.
     using Places = std::function<std::string(const Url& url)>;
     void setPlaces(Places places) { _places = std::move(places); }
 
-    /// Fetches what is missing for the visible rows.
+    /// Fetches the missing details of the visible rows.
     void visibleRowsDidChange();
-    /// Items may have changed, or with nothing all: known details stay on the screen until the next
-    /// `visibleRowsDidChange` has read them again. What folders hold may always have changed.
+    /// The details of these items, or of all when absent, may have changed. Known details stay on the screen
+    /// until the next `visibleRowsDidChange` has read them again. Folders are always read again, because
+    /// their content changes without a notice.
     void invalidateDetails(const std::optional<std::vector<kit::RowId>>& rows = std::nullopt);
 
     std::size_t numberOfRows(const kit::ListView& list) const override;
@@ -63,14 +65,16 @@ private:
         RowDetails details{};
         bool isNew = true, isStale = false;
         std::optional<Image> thumbnail{};
-        std::optional<Date> thumbnailOf{}; ///< the version that a thumbnail was looked for
+        std::optional<Date>
+            thumbnailOf{}; ///< the version of the document for which a thumbnail was last looked up
     };
     using Loader = VisibleRowLoader<RowDetails>;
     using ThumbnailLoader = VisibleRowLoader<std::optional<Image>>;
 
     void detailsArrived(kit::RowId id, RowDetails details);
     void thumbnailArrived(kit::RowId id, std::optional<Image> thumbnail);
-    /// Asked with what is known of a row; null: nothing.
+    /// Answers the visible rows for which the function answers true. It is given the row's known details, or
+    /// null when there are none.
     std::vector<RowRequest> visibleRowsThat(
         const std::function<bool(const Known* known)>& lackSomething) const;
     void fetchThumbnails();

@@ -23,11 +23,11 @@ kit::RowId idOfName(std::string_view name)
 
 kit::RowId idOfExtraItem(const Url& url)
 {
-    // A library may have the name of a folder beside it.
+    // The hash is inverted, because a folder beside the library may have the same name.
     return ~std::hash<std::string>{}(url.path());
 }
 
-/// What a row shows of its entry beside the name, in one number.
+/// Answers in one number how a row looks apart from its name.
 unsigned appearance(const FolderEntry& entry)
 {
     return static_cast<unsigned>(entry.kind) * 2 + (entry.isPromise ? 1 : 0);
@@ -66,7 +66,7 @@ std::vector<kit::RowRange> rowsOfOtherAppearance(const DocumentRows& before, con
     return rangesOf(changed);
 }
 
-/// The splices that take rows away and put others in.
+/// Answers the splices that remove and insert the rows.
 std::vector<kit::ListSplice> splicesOf(const SnapshotOrder::Step& step)
 {
     std::vector<kit::ListSplice> splices;
@@ -106,7 +106,8 @@ std::shared_ptr<const DocumentRows> DocumentRows::make(
     const std::shared_ptr<DocumentRows> rows(new DocumentRows(std::move(snapshot), std::move(places)));
     for (std::size_t row = 0; row < rows->_snapshot->count(); ++row) {
         auto id = rows->idAt(row);
-        // For a moment a document may stand beside its own promise: same name, neighbours in the order.
+        // A document may for a moment stand beside its own promise. Both have the same name and are
+        // neighbours in the order, so the second one gets the next identifier.
         if (row > 0 && rows->_ids.back() == id)
             ++id;
         rows->_ids.push_back(id);

@@ -20,16 +20,16 @@ namespace screens {
 
 class DocumentRows;
 
-/// A new state of a list's rows, and the way to it from the state before.
+/// A new state of a list's rows, and the difference from the state before.
 struct RowsStep {
     std::shared_ptr<const DocumentRows> rows;
     kit::ListChanges changes;
-    /// The rows whose items may have other details now; nothing: all may.
+    /// The rows whose items may have other details now; absent when all may have.
     std::optional<std::vector<kit::RowId>> touched;
 };
 
 /// The rows that a folder list shows: the items of one snapshot in some order, with the identifiers of their
-/// rows. Immutable; any thread. To make one takes a pass over all names, and what a SnapshotOrder takes.
+/// rows. Immutable; any thread. Making one passes over all names once and makes a SnapshotOrder.
 class DocumentRows {
 public:
     static std::shared_ptr<const DocumentRows> make(
@@ -39,26 +39,26 @@ public:
     std::span<const kit::RowId> ids() const { return _ids; }
     FolderEntry entry(std::size_t row) const { return _snapshot->entry(snapshotIndex(row)); }
     Url url(std::size_t row) const { return _snapshot->url(snapshotIndex(row)); }
-    /// Null for an item of the folder itself.
+    /// Answers null for an item of the folder itself.
     const FolderSnapshot::ExtraItem* extraItem(std::size_t row) const
     {
         return _snapshot->extraItem(snapshotIndex(row));
     }
     const std::shared_ptr<const FolderSnapshot>& snapshot() const { return _snapshot; }
 
-    /// The rows of the list's next snapshot. When it is a revision of the one before, in the same order, only
-    /// what it names costs more than a copy.
+    /// Answers the rows of the list's next snapshot. When it is a revision of the one before, in the same
+    /// order, the cost is a copy and the work for the items that the revision names.
     static RowsStep step(
         const DocumentRows& before, std::shared_ptr<const FolderSnapshot> snapshot, const ListOrder& order);
 
-    /// The identifier that the row of an item has, whether it is there or not.
+    /// Answers the identifier that the row of an item has or would have.
     kit::RowId idFor(const Url& url) const;
 
-    /// The first row at or after `from`, and then from the top, whose name begins with a text,
-    /// whatever its case and accents. Main thread.
+    /// Answers the first row at or after `from`, and then from the top, whose name begins with a text
+    /// regardless of case and accents. Main thread.
     std::optional<std::size_t> rowBeginningWith(std::string_view text, std::size_t from) const;
 
-    /// The exact way from one state of a list to another; rows whose kind or promise changed count as
+    /// Answers the exact difference between two states of a list. Rows whose kind or promise changed count as
     /// changed.
     static kit::ListChanges changes(const DocumentRows& before, const DocumentRows& after);
 

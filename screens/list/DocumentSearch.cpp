@@ -62,7 +62,7 @@ void DocumentSearch::build()
     }
     _presentation->setDelegate(std::shared_ptr<kit::SearchPresentationDelegate>(
         shared_from_this(), static_cast<kit::SearchPresentationDelegate*>(this)));
-    // It learns the names before the first letter is typed.
+    // The search begins with an empty query, so that the names are read before the first letter is typed.
     begin();
 }
 

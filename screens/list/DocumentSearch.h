@@ -23,13 +23,13 @@ namespace screens {
 class DocumentRowSource;
 class PlaceholderView;
 
-/// The search over a folder list: the items of the whole drive whose names hold what is typed, each with its
-/// place. Main thread only.
+/// The search over a folder list. It finds the items of the whole drive whose names contain the query, and
+/// shows each with its place. Main thread only.
 class DocumentSearch : public std::enable_shared_from_this<DocumentSearch>,
                        private kit::SearchPresentationDelegate,
                        private kit::ListViewDelegate {
 public:
-    /// What the user does with a result.
+    /// The actions of the user on a result.
     struct Handlers {
         std::function<void(const Url& url, FolderEntryKind kind)> chosen;
         std::function<void(const Url& url)> showInFolder;
@@ -38,7 +38,7 @@ public:
     static std::shared_ptr<DocumentSearch> create(Handlers handlers);
     explicit DocumentSearch(Handlers handlers);
 
-    /// The screen to present; it shows the results.
+    /// Answers the screen to present, which shows the results.
     const std::shared_ptr<kit::SearchPresentation>& presentation() const { return _presentation; }
     const std::shared_ptr<kit::ListView>& results() const { return _results; }
     const std::shared_ptr<PlaceholderView>& placeholder() const { return _placeholder; }
@@ -56,12 +56,12 @@ private:
     kit::Menu menuForRow(kit::ListView& list, std::size_t index) override;
     void resultsArrived(const NameSearchResults& results);
     void showState(const NameSearchResults& results);
-    /// Does what was typed ahead of the results, once they are there.
+    /// Carries out the keys that were pressed before the results arrived.
     void catchUp();
 
-    /// What keys in the field asked of the results.
+    /// The keys that were pressed in the field before the results arrived.
     struct Ahead {
-        std::size_t down = 0; ///< how often
+        std::size_t down = 0; ///< how many rows down
         bool opens = false;
     };
 
@@ -71,8 +71,8 @@ private:
     std::shared_ptr<PlaceholderView> _placeholder;
     std::shared_ptr<DocumentRowSource> _source;
     std::shared_ptr<NameSearchSession> _session;
-    std::string _shownQuery; ///< of the rows that are shown
-    bool _isComplete = false; ///< there will be no other rows for it
+    std::string _shownQuery; ///< the query of the rows that are shown
+    bool _isComplete = false; ///< whether the rows for this query are complete
     Ahead _ahead;
 };
 

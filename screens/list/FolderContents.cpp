@@ -12,7 +12,7 @@ namespace screens {
 
 namespace {
 
-/// Of so many revisions that wait the last alone says it sooner.
+/// When so many revisions wait, applying the newest whole list at once is quicker than applying them all.
 constexpr std::size_t mostWaiting = 8;
 
 FolderContentsUpdate updateBetween(
@@ -49,9 +49,9 @@ void FolderContents::start(std::vector<FolderSnapshot::ExtraItem> extraItems, co
 
 void FolderContents::snapshotArrived(Snapshot snapshot)
 {
-    // After the first rows of a listing anew, the complete list that is shown already says more.
+    // The beginning of a new listing is skipped when the list that is shown already holds more rows.
     const bool isBeginning = snapshot->stage() == ListingStage::FirstRows;
-    // The first rows of another order than the lister's are not known before all rows are.
+    // In an order that is not the lister's own, the first rows are known only when all rows are.
     if (isBeginning && (_rows->count() >= snapshot->count() || !_order.isListersOwn()))
         return;
     if (_isWorking)
@@ -62,7 +62,7 @@ void FolderContents::snapshotArrived(Snapshot snapshot)
 
 void FolderContents::wait(Snapshot snapshot)
 {
-    // A list that was read whole needs none of those before it; a revision is understood after them only.
+    // A whole list replaces every waiting one. A revision has to be applied after those before it.
     if (!snapshot->revision() || _waiting.size() >= mostWaiting)
         _waiting.clear();
     _waiting.push_back(std::move(snapshot));

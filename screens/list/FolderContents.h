@@ -16,28 +16,28 @@
 
 namespace screens {
 
-/// A new state of a folder's list and the way to it from the state before.
+/// A new state of a folder's list, and the difference from the state before.
 struct FolderContentsUpdate : RowsStep {
     ListingStage stage;
-    std::optional<Error> error; ///< with ListingStage::Failed
+    std::optional<Error> error; ///< set with ListingStage::Failed
 };
 
-/// Lists one folder, follows its changes and works out the exact differences, off the main thread where there
-/// are many rows. Main thread only.
+/// Lists one folder, follows its changes and computes the exact differences. Differences of many rows are
+/// computed off the main thread. Main thread only.
 class FolderContents : public std::enable_shared_from_this<FolderContents> {
 public:
     using Update = std::function<void(const FolderContentsUpdate&)>;
 
-    /// Up to this many rows a difference is worked out at once (well under a millisecond).
+    /// Differences of up to so many rows are computed at once, which takes well under a millisecond.
     static constexpr std::size_t immediateRows = 2000;
 
-    /// `update` is called on the main thread for every state, never from within `start`.
+    /// `update` is called on the main thread for every new state, never from within `start`.
     static std::shared_ptr<FolderContents> create(Url folder, Update update);
 
     FolderContents(Url folder, Update update);
 
-    /// Lists the folder, and the extra items with it, from the beginning; what is shown stays until the new
-    /// list is there.
+    /// Lists the folder with the extra items from the beginning. The old list stays on the screen until the
+    /// new one is there.
     void start(std::vector<FolderSnapshot::ExtraItem> extraItems, const ListOrder& order);
 
     const std::shared_ptr<const DocumentRows>& rows() const { return _rows; }
@@ -56,7 +56,8 @@ private:
     ListOrder _order;
     std::shared_ptr<FolderListing> _listing;
     std::shared_ptr<OperationQueue> _queue;
-    /// What arrived while a difference is worked out: the newest list, and its revisions since.
+    /// The snapshots that arrived while a difference is computed: the newest whole list and its later
+    /// revisions.
     std::deque<Snapshot> _waiting;
     bool _isWorking = false;
 };

@@ -14,23 +14,24 @@ namespace screens {
 enum class OrderKey : std::uint8_t { Name, Date, Size, Kind };
 enum class OrderDirection : std::uint8_t { Ascending, Descending };
 
-/// In which order a folder's list shows its items. A value.
+/// The order in which a folder's list shows its items. A value.
 struct ListOrder {
     OrderKey key = OrderKey::Name;
     OrderDirection direction = OrderDirection::Ascending;
     FolderGrouping grouping = FolderGrouping::FoldersFirst;
 
-    /// Whether it is the order in which the lister delivers the items.
+    /// Answers whether the lister delivers the items in this order.
     bool isListersOwn() const { return key == OrderKey::Name && direction == OrderDirection::Ascending; }
-    /// Whether each item has to be looked at for it.
+    /// Answers whether every item's attributes have to be read to order them.
     bool needsLooks() const { return key == OrderKey::Date || key == OrderKey::Size; }
-    /// The order for a key that was just chosen: the newest and the largest come first, names from A.
+    /// Answers the order for a key that the user just chose. Dates begin with the newest, sizes with the
+    /// largest, names with A.
     ListOrder sortedBy(OrderKey chosen) const;
     bool operator==(const ListOrder&) const = default;
 };
 
-/// The order that the user chose for a folder, kept between runs for the folders that were used last; else
-/// the default. Main thread.
+/// Answers the order that the user chose for a folder, else the default. The choices are kept between runs
+/// for the folders that were used last. Main thread.
 ListOrder savedOrder(const Url& folder);
 void saveOrder(const Url& folder, const ListOrder& order);
 

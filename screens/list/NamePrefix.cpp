@@ -13,7 +13,7 @@ namespace screens {
 
 namespace {
 
-/// More than a prefix has beyond what is sought, unless accents stand apart from their letters.
+/// A name's prefix has at most so many bytes more than the text, unless accents are separate characters.
 constexpr std::size_t usualExcess = 4;
 
 bool isAscii(char c)
@@ -26,7 +26,7 @@ char lower(char c)
     return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
 }
 
-/// The beginning of a text up to a byte, and on to the end of the character there.
+/// Answers the beginning of a text of so many bytes, and the rest of the character at its end.
 std::string_view beginning(std::string_view text, std::size_t bytes)
 {
     const auto isInside = [&](std::size_t at) {
@@ -81,7 +81,8 @@ bool NamePrefix::beginsFolded(std::string_view name)
             break;
     }
     _asked = part;
-    // What follows a short name would belong to it.
+    // The whole name was folded. A longer name that begins with it could continue its last character, so the
+    // answer is not reused.
     if (part.size() == name.size())
         _asked.clear();
     _answer = _folded.starts_with(_text);

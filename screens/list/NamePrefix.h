@@ -9,9 +9,8 @@
 
 namespace screens {
 
-/// A text that names are asked for to begin with, without case and accents, in every script. Names whose
-/// first characters decide are not folded, so that a hundred thousand of them are asked in a few
-/// milliseconds.
+/// Answers whether names begin with a text, regardless of case and accents, in every script. A name is not
+/// folded when its first characters decide, so that a hundred thousand names take a few milliseconds.
 class NamePrefix {
 public:
     explicit NamePrefix(std::string_view text);
@@ -23,8 +22,9 @@ private:
     bool beginsFolded(std::string_view name);
 
     std::string _text; ///< folded
-    std::unordered_map<std::string, bool> _firstCharacters; ///< whether a name that begins with it may do
-    std::string _asked, _folded; ///< as much of the name that was folded last as decided
+    std::unordered_map<std::string, bool>
+        _firstCharacters; ///< by first character: whether a name that begins with it may match
+    std::string _asked, _folded; ///< the part of the last folded name that decided the answer
     bool _answer = false;
 };
 

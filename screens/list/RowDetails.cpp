@@ -25,7 +25,7 @@ PromisedItems& promisedItems()
     return services().cloudDocumentService().promisedItems();
 }
 
-/// Whether a name of a folder stands for an item that its list shows.
+/// Answers whether a name in a folder stands for an item that the folder's list shows.
 bool isListed(const std::filesystem::path& path)
 {
     const auto name = path.filename();

@@ -15,20 +15,20 @@
 
 namespace screens {
 
-/// What a row shows beyond what the listing knows. A value.
+/// The details that a row shows beyond the listing's own. A value.
 struct RowDetails {
     std::optional<std::string> name; ///< the localized name
     std::string text; ///< date and size, or date and number of items, and whether it is shared
     kit::DownloadState download = kit::DownloadState::Present;
     std::vector<std::string> tagNames;
-    bool isContainer = false; ///< what it holds changes without a notice in its own folder
-    std::optional<Date> modified; ///< a document that is here: its thumbnail is of this version
+    bool isContainer = false; ///< its content changes without a notice in its own folder
+    std::optional<Date> modified; ///< of a downloaded document; its thumbnail shows this version
 
     bool operator==(const RowDetails&) const = default;
 };
 
-/// Asks for the details of one item. Several system calls, and for a folder one pass over its names; any
-/// thread. What cannot be read is left out.
+/// Reads the details of one item. It takes several system calls, and for a folder one pass over its names.
+/// Any thread. Details that cannot be read are left out.
 RowDetails readRowDetails(const Url& url, FolderEntryKind kind);
 
 } // namespace screens

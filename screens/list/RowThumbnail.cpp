@@ -14,7 +14,7 @@ namespace screens {
 
 namespace {
 
-/// The pixels of the source, from one column and row to others, that become one pixel.
+/// The rectangle of source pixels that becomes one pixel.
 struct Area {
     int left, top, right, bottom;
 };
@@ -38,7 +38,7 @@ std::uint32_t mean(const Image& image, const Area& area)
     return pixel;
 }
 
-/// Where the source's part for one of `count` pixels begins and ends.
+/// Answers where the source pixels for one of `count` pixels begin and end.
 std::pair<int, int> part(int index, int count, int length)
 {
     const auto at = [&](int place) {

@@ -11,15 +11,16 @@
 
 namespace screens {
 
-/// The longer side of a row's thumbnail in pixels: 40 points at twice the resolution.
+/// The longer side of a row's thumbnail in pixels, which is 40 points at twice the resolution.
 inline constexpr int rowThumbnailSide = 80;
 
-/// A small picture of a document from the shared thumbnails; one of a picture that has none is made. Decodes
-/// pictures: off the main thread. Nothing when there is none.
+/// Answers a small picture of a document from the shared thumbnail cache. For an image file without a
+/// thumbnail it makes one. Answers nothing when there is none. It decodes images, so call it off the main
+/// thread.
 std::optional<Image> readRowThumbnail(const Url& url);
 
-/// A picture made smaller so that its longer side has a number of pixels, each the mean of those it stands
-/// for, with two pixels to a point; one that is small enough stays as it is.
+/// Answers an image whose longer side has at most so many pixels, with two pixels to a point. Each pixel is
+/// the mean of those it replaces. An image that is small enough stays as it is.
 Image scaledDown(const Image& image, int side);
 
 } // namespace screens

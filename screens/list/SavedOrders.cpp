@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// The orders that the user chose for folders, in the user defaults.
+// This file keeps the orders that the user chose for folders in the user defaults.
 
 #include "platform/Services.h"
 #include "platform/UserDefaults.h"
@@ -19,10 +19,11 @@ namespace screens {
 namespace {
 
 constexpr auto defaultsKey = "FolderOrders";
-/// More folders than a person keeps in mind; what was not used for longest is forgotten beyond.
+/// A person does not remember more folders than this. Beyond it, the order that was not used for longest is
+/// dropped.
 constexpr std::size_t mostFolders = 500;
 
-/// A folder is known by a hash of its path (64-bit FNV-1a), which stays the same from run to run.
+/// Answers the key of a folder: a hash of its path (64-bit FNV-1a), which stays the same from run to run.
 std::string nameOf(const Url& folder)
 {
     std::uint64_t hash = 0xcbf29ce484222325ULL;
@@ -48,7 +49,8 @@ std::optional<ListOrder> orderOf(char code)
         static_cast<FolderGrouping>(number % 2)};
 }
 
-/// One text for each folder, the one used last at the end: the code of its order, then its name.
+/// Answers one text for each folder, the one used last at the end. A text is the code of the order and then
+/// the folder's key.
 PropertyArray savedOrders()
 {
     const auto data = services().userDefaults().data(defaultsKey);

@@ -21,7 +21,7 @@ namespace screens {
 
 namespace {
 
-/// What cannot be known sorts before everything that can.
+/// An unknown key sorts before every known one.
 constexpr std::int64_t unknown = std::numeric_limits<std::int64_t>::min();
 
 bool isFolder(FolderEntryKind kind)
@@ -65,7 +65,7 @@ std::int64_t lookAt(const FolderSnapshot& snapshot, std::size_t index, OrderKey 
 
 } // namespace
 
-/// A number for each kind in a snapshot, in the order of the kinds' descriptions.
+/// Numbers the kinds in a snapshot in the order of their descriptions.
 class KindRanks {
 public:
     explicit KindRanks(const FolderSnapshot& snapshot)
@@ -81,7 +81,7 @@ public:
             place = rank++;
     }
 
-    /// Nothing for a kind that the snapshot had none of.
+    /// Answers nothing for a kind that does not occur in the snapshot.
     std::optional<std::int64_t> rank(const FolderEntry& entry) const
     {
         const auto known = _names.find(keyFor(entry));
@@ -90,7 +90,7 @@ public:
     }
 
 private:
-    // What has no name of its own comes first: folders, then links.
+    // Kinds without a name of their own come first: folders, then links.
     static std::string keyFor(const FolderEntry& entry)
     {
         if (isFolder(entry.kind))
@@ -148,7 +148,8 @@ bool SnapshotOrder::isBefore(const FolderSnapshot& snapshot, std::uint32_t a, st
     return a < b;
 }
 
-/// Carries an order over to a revision: what stays in sequence is kept, the rest is merged into it.
+/// Carries an order over to a revision. Rows that stay in sequence are kept, and the others are merged into
+/// them.
 class SnapshotOrder::Merge {
 public:
     Merge(const SnapshotOrder& before, SnapshotOrder& after, const FolderSnapshot& snapshot, Step& step)
@@ -198,7 +199,7 @@ void SnapshotOrder::Merge::numberAnew()
     }
 }
 
-/// Whether all keys are known.
+/// Finds the keys of the new entries. Answers whether all of them are known.
 bool SnapshotOrder::Merge::findKeys()
 {
     numberAnew();
@@ -222,7 +223,7 @@ bool SnapshotOrder::Merge::findKeys()
     return std::ranges::all_of(_revision.inserted, find) && std::ranges::all_of(_revision.touched, find);
 }
 
-/// Of the row at or after one that keeps its key, the new index.
+/// Answers the new index of the first row at or after `row` that keeps its key.
 std::uint32_t SnapshotOrder::Merge::nextStill(std::size_t row)
 {
     const auto isStill = [this](std::size_t at) {
@@ -236,7 +237,8 @@ std::uint32_t SnapshotOrder::Merge::nextStill(std::size_t row)
     return gone;
 }
 
-/// The rows that stay in sequence. An item with another key stays where that puts it between the same two.
+/// Answers the rows that stay in sequence. An item with another key stays when the key still sorts between
+/// the same neighbours.
 SnapshotOrder::Indexes SnapshotOrder::Merge::keptRows()
 {
     Indexes kept;

@@ -16,13 +16,13 @@ namespace screens {
 
 class KindRanks;
 
-/// The places of a snapshot's entries in an order; equal ones stay in the order of their names. A value. To
-/// make one looks at each item where the order needs that: off the main thread then.
+/// The rows of a snapshot's entries in an order. Equal entries stay in the order of their names. A value.
+/// Making one reads every item's attributes when the order needs them, which belongs off the main thread.
 class SnapshotOrder {
 public:
     using Indexes = std::vector<std::uint32_t>;
-    /// What a revision does to the rows: which go, of those before; which come and which may show something
-    /// else, of those after. All rise.
+    /// The effect of a revision on the rows: `removed` are old rows, `inserted` and `touched` new ones, of
+    /// which the touched may show something else. All are in rising order.
     struct Step {
         Indexes removed, inserted, touched;
     };
@@ -30,11 +30,11 @@ public:
     SnapshotOrder(const FolderSnapshot& snapshot, const ListOrder& order);
 
     const ListOrder& order() const { return _order; }
-    /// The entry of the snapshot that stands in a row.
+    /// Answers the index in the snapshot of the entry in a row.
     std::size_t index(std::size_t row) const { return _indexes.empty() ? row : _indexes[row]; }
 
-    /// The same order of a revision of the snapshot, for which only what it names is looked at. Nothing when
-    /// it can only be made anew.
+    /// Answers the same order for a revision of the snapshot; only the items that the revision names are
+    /// read. Answers nothing when the order has to be made anew.
     std::optional<SnapshotOrder> revised(const FolderSnapshot& after, Step& step) const;
 
 private:
@@ -44,8 +44,9 @@ private:
     bool isBefore(const FolderSnapshot& snapshot, std::uint32_t a, std::uint32_t b) const;
 
     ListOrder _order;
-    Indexes _indexes; ///< of the rows' entries; empty: the snapshot's own order
-    std::vector<std::int64_t> _keys; ///< by the snapshot's indexes; empty: names, which need none
+    Indexes _indexes; ///< the snapshot's index of each row; empty: the snapshot's own order
+    std::vector<std::int64_t>
+        _keys; ///< by the snapshot's indexes; empty when ordered by name, which needs none
     std::shared_ptr<const KindRanks> _kinds;
 };
 

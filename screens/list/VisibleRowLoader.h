@@ -20,15 +20,15 @@
 
 namespace screens {
 
-/// A row that something is to be read for.
+/// A row for which a value is to be read.
 struct RowRequest {
     kit::RowId id;
     Url url;
     FolderEntryKind kind;
 };
 
-/// Reads something for the rows that are on the screen, off the main thread. What is no longer wanted when
-/// its turn comes is skipped; what arrives too late is dropped. Main thread only.
+/// Reads a value for each visible row off the main thread. A row that is no longer wanted when its turn comes
+/// is skipped, and a value that arrives too late is dropped. Main thread only.
 template <typename Value>
 class VisibleRowLoader : public std::enable_shared_from_this<VisibleRowLoader<Value>> {
 public:
@@ -44,7 +44,7 @@ public:
         _shared->read = std::move(read);
     }
 
-    /// The rows that still lack their value: others are not wanted any more.
+    /// Sets the rows that still lack their value. Other rows are not wanted any more.
     void setWanted(const std::vector<RowRequest>& requests)
     {
         std::unordered_map<kit::RowId, Ticket> wanted;
@@ -62,14 +62,14 @@ public:
             fetch(*request, ticket);
     }
 
-    /// Forgets what is under way, so that the next `setWanted` reads everything again.
+    /// Forgets the reads that are under way, so that the next `setWanted` reads everything again.
     void cancelAll()
     {
         const std::lock_guard lock(_shared->mutex);
         _shared->wanted.clear();
     }
 
-    /// The same for one row.
+    /// Forgets the read that is under way for one row.
     void cancel(kit::RowId id)
     {
         const std::lock_guard lock(_shared->mutex);
@@ -83,7 +83,7 @@ private:
         Ticket ticket;
         Value value;
     };
-    /// What the workers see.
+    /// The state that the worker threads share.
     struct Shared {
         std::mutex mutex;
         Read read;
@@ -97,7 +97,8 @@ private:
             const auto known = wanted.find(id);
             return known != wanted.end() && known->second == ticket;
         }
-        // Whether a delivery has to be posted: what is found in the meantime goes with the one that waits.
+        // Keeps a value. Answers whether a delivery has to be posted; a delivery that is already posted takes
+        // this value with it.
         bool keep(Found value)
         {
             const std::lock_guard lock(mutex);

@@ -14,7 +14,7 @@ namespace screens {
 
 namespace {
 
-constexpr std::size_t longestName = 255; ///< bytes, of the file systems in use
+constexpr std::size_t longestName = 255; ///< bytes; the limit of Linux file systems
 
 std::string trimmed(const std::string& text)
 {

@@ -13,8 +13,8 @@ class AlertController;
 
 namespace screens {
 
-/// An alert that asks for the name of a folder to be made. `chosen` is called once, after it has closed, with
-/// a name that can be one; not when the user cancels. Main thread only.
+/// Answers an alert that asks for the name of a new folder. `chosen` is called once with a valid name, after
+/// the alert has closed; it is not called when the user cancels. Main thread only.
 std::shared_ptr<kit::AlertController> makeFolderNameAlert(std::function<void(const std::string&)> chosen);
 
 } // namespace screens

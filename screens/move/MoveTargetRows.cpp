@@ -18,7 +18,7 @@ namespace {
 
 constexpr const char* folderIcon = "folder";
 
-/// Rows are named after what they show, so that a row keeps its identifier wherever it stands.
+/// Identifiers are hashes of what the rows show, so that a row keeps its identifier wherever it stands.
 kit::RowId idOf(std::string_view group, std::string_view name)
 {
     return std::hash<std::string>{}(std::string(group) + '/' + std::string(name));

@@ -18,7 +18,7 @@ namespace screens {
 /// folder. Main thread only.
 class MoveTargetRows : public kit::ListViewDataSource {
 public:
-    /// Whether a folder is to be moved itself, and so can be no destination.
+    /// Answers whether a folder is itself to be moved and so cannot be a destination.
     using IsToBeMoved = std::function<bool(const Url&)>;
     enum class Libraries { Shown, Hidden };
 
@@ -27,7 +27,7 @@ public:
     void setSnapshot(std::shared_ptr<const FolderSnapshot> snapshot);
     void setRecents(std::vector<Url> recents) { _recents = std::move(recents); }
 
-    /// The folder of a row; nothing for a heading and for a folder that is to be moved.
+    /// Answers the folder of a row, or nothing for a heading and for a folder that is to be moved.
     std::optional<Url> destination(std::size_t index) const;
     bool isRecent(std::size_t index) const { return index > 0 && index <= _recents.size(); }
     std::vector<kit::RowId> ids() const;

@@ -24,7 +24,7 @@ namespace screens {
 
 namespace {
 
-/// Beyond this the exact difference of two states would cost a frame.
+/// With more rows than this the exact difference of two states would take longer than a frame.
 constexpr std::size_t differenceLimit = 2000;
 
 void fill(kit::View& parent, const std::shared_ptr<kit::View>& view)
@@ -116,7 +116,8 @@ void MoveTargetScreen::makeBars()
 
 bool MoveTargetScreen::backRequested()
 {
-    // Cancel stands on every screen of the picker; going back is another thing below the first one.
+    // Every screen of the picker has a Cancel button, which the default would press. Below the first screen,
+    // going back leads to the folder above instead.
     const auto picker = _picker.lock();
     if (!picker || picker->viewControllers().front() != shared_from_this())
         return false;

@@ -24,11 +24,11 @@ namespace screens {
 class MoveTargetPicker;
 class PlaceholderView;
 
-/// One folder of a MoveTargetPicker: its folders, and while the picker starts the recent destinations above
-/// them. Main thread only.
+/// One folder of a MoveTargetPicker. It shows the folder's subfolders, and on the picker's first screen the
+/// recent destinations above them. Main thread only.
 class MoveTargetScreen : public kit::ViewController, private kit::ListViewDelegate {
 public:
-    /// The destinations shown as recent, at most.
+    /// At most so many destinations are shown as recent.
     static constexpr std::size_t shownRecents = 3;
 
     MoveTargetScreen(std::weak_ptr<MoveTargetPicker> picker, Url folder);
@@ -38,7 +38,7 @@ public:
     const std::shared_ptr<kit::ListView>& listView() const { return _listView; }
     const std::shared_ptr<PlaceholderView>& placeholder() const { return _placeholder; }
 
-    /// Asks for a name, and makes and enters the folder with it.
+    /// Asks for a name, creates the folder and enters it.
     void askForNewFolder();
 
     void loadView() override;

@@ -11,11 +11,11 @@
 
 namespace screens {
 
-/// The folders that items were moved to last, the latest one first, kept between runs. They may be gone by
-/// now. Main thread only.
+/// The folders to which items were last moved, the latest one first, kept between runs. They may have been
+/// deleted since. Main thread only.
 class RecentMoveTargets {
 public:
-    static constexpr std::size_t kept = 8; ///< more than are shown, as some of them do not fit a move
+    static constexpr std::size_t kept = 8; ///< more than are shown, because some of them do not fit a move
 
     static std::vector<Url> folders();
     static void remember(const Url& folder);

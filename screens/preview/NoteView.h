@@ -12,7 +12,7 @@
 
 namespace screens {
 
-/// A text of several lines that a person writes. Main thread only.
+/// A text of several lines that the user writes. Main thread only.
 class NoteView : public kit::HostedView {
 public:
     static constexpr const char* kindName = "note";
@@ -25,17 +25,17 @@ public:
     }
 
     const std::string& text() const { return _text; }
-    /// Event up: the native view shows this text now.
+    /// Event up: the native view now shows this text.
     void userEdited(std::string text) { _text = std::move(text); }
 
 private:
     std::string _text;
 };
 
-/// A note as the content of an alert.
+/// Shows a note as the content of an alert.
 class NoteScreen : public kit::ViewController {
 public:
-    /// `name` is what the text is called, for those who do not see it.
+    /// `name` is the name by which a screen reader announces the text.
     NoteScreen(const std::string& name, std::string text)
         : _note(std::make_shared<NoteView>(std::move(text)))
     {

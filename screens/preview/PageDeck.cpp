@@ -11,7 +11,7 @@ namespace screens {
 
 namespace {
 
-constexpr double narrowestWindow = 64; ///< points, while there is no window yet
+constexpr double narrowestWindow = 64; ///< points; used while there is no window yet
 
 std::size_t bytesOf(const std::optional<Image>& picture)
 {
@@ -110,7 +110,7 @@ PageDeck::PageRange PageDeck::pagesIn(const Rect& visible) const
 
 std::size_t PageDeck::currentPage(const Rect& visible) const
 {
-    constexpr double readingPlace = 0.4; ///< of the window's height
+    constexpr double readingPlace = 0.4; ///< share of the window's height
     return pageAt(visible.y + visible.height * readingPlace).value_or(0);
 }
 
@@ -151,7 +151,7 @@ std::optional<PageDeck::Task> PageDeck::nextTask(const Rect& visible) const
     }
     if (const auto task = detailTask(visible))
         return task;
-    // The neighbours, so that turning the page shows it at once.
+    // The neighbouring pages are drawn as well, so that they show at once when the user turns the page.
     const PageRange near{seen.first > 0 ? seen.first - 1 : 0, std::min(seen.end + 1, _pages.size())};
     for (const auto page : {near.end - 1, near.first}) {
         const auto task = _pages.empty() ? std::nullopt : missing(page);
@@ -161,7 +161,8 @@ std::optional<PageDeck::Task> PageDeck::nextTask(const Rect& visible) const
     return std::nullopt;
 }
 
-/// Whether a neighbour can be kept: it would be drawn again and again otherwise.
+/// Answers whether a neighbouring page fits into the memory limit, because it would otherwise be dropped and
+/// drawn again and again.
 bool PageDeck::hasRoomFor(const Task& task, const PageRange& near) const
 {
     double bytes = task.part.width * task.part.height * task.pixelsPerPoint * task.pixelsPerPoint * 4;
@@ -170,7 +171,7 @@ bool PageDeck::hasRoomFor(const Task& task, const PageRange& near) const
         if (page != task.page && kept != _kept.end())
             bytes += static_cast<double>(bytesOf(kept->second.picture));
     }
-    // Sides are rounded to whole pixels.
+    // The estimate is rough because sides are rounded to whole pixels.
     constexpr double roughly = 0.95;
     return bytes < roughly * static_cast<double>(maxPictureBytes);
 }
@@ -204,7 +205,7 @@ void PageDeck::finish(const Task& task, std::optional<Image> picture, const Rect
 {
     if (task.page >= _pages.size())
         return;
-    // A detail of before is better than none, but only until the page itself is as fine.
+    // An old detail is better than none, but only until the page itself has been drawn as finely.
     if (_detail && !task.isDetail && _detail->task.page == task.page && _detail->task.pixelsPerPoint == 0
         && isNear(task.pixelsPerPoint, fullPixelsPerPoint()))
         _detail.reset();
@@ -225,7 +226,7 @@ void PageDeck::evict(const Rect& visible)
         return page < seen.first ? seen.first - page : page >= seen.end ? page - seen.end + 1 : 0;
     };
     while (bytes > maxPictureBytes && _kept.size() > 1) {
-        // The farthest is at one of the two ends.
+        // The farthest page is at one of the two ends.
         const auto first = _kept.begin(), last = std::prev(_kept.end());
         const auto farthest = distance(first->first) > distance(last->first) ? first : last;
         if (distance(farthest->first) == 0)

@@ -14,50 +14,54 @@
 
 namespace screens {
 
-/// Pages one below the other, and the pictures that are kept of them. The widest page fits the window at a
-/// zoom of 1. "Content" points are the interface's from the top left corner of all the pages; "page" points
-/// are the document's own. A value that knows no thread.
+/// Pages one below the other, and the pictures of them that are kept. The widest page fits the window at a
+/// zoom of 1. "Content" points are the interface's, counted from the top left corner of all the pages; "page"
+/// points are the document's own. A value that knows no thread.
 class PageDeck {
 public:
     static constexpr double gap = 12; ///< between pages and around them, content points at a zoom of 1
     static constexpr double widestFit = 900; ///< a page is not made wider than this to fit
     static constexpr double maxPagePixels = 6e6; ///< a picture of a whole page has no more
-    static constexpr std::size_t maxPictureBytes = 64 << 20; ///< of all pictures that are kept
+    static constexpr std::size_t maxPictureBytes = 64 << 20; ///< the limit for all kept pictures together
 
-    void setPages(std::vector<Size> pages); ///< pictures of pages that keep their size stay, as stale ones
-    /// `scale` is device pixels to a point.
+    void setPages(
+        std::vector<Size> pages); ///< pages that keep their size keep their pictures, which count as stale
+    /// `scale` is the number of device pixels to a point.
     void setWindow(double width, double scale);
-    /// Everything grows with the zoom, gaps included, so that a place in the content is a part of its size.
+    /// The pages and the gaps grow with the zoom, so that a place in the content stays the same share of its
+    /// size.
     void setZoom(double zoom);
     double zoom() const { return _zoom; }
 
     std::size_t pageCount() const { return _pages.size(); }
     Size contentSize() const;
-    Rect pageFrame(std::size_t page) const; ///< in the content
-    std::optional<std::size_t> pageAt(double y) const; ///< the nearest one
+    Rect pageFrame(std::size_t page) const; ///< content points
+    std::optional<std::size_t> pageAt(
+        double y) const; ///< answers the page nearest to a height in the content
     struct PageRange {
         std::size_t first = 0, end = 0;
     };
     PageRange pagesIn(const Rect& visible) const;
-    /// The page that somebody who sees this is reading.
+    /// Answers the page that the user is reading when this part of the content is visible.
     std::size_t currentPage(const Rect& visible) const;
     Point toPage(std::size_t page, Point content) const;
     Rect toContent(std::size_t page, const Rect& onPage) const;
 
-    /// A picture to be drawn: of a whole page, or of the part that is seen.
+    /// A picture to be drawn, either of a whole page or of the visible part.
     struct Task {
         std::size_t page = 0;
         double pixelsPerPoint = 1;
         Rect part; ///< page points
         bool isDetail = false;
     };
-    /// What is missing most for somebody who sees this; nothing when all is there.
+    /// Answers the picture that is most urgent when this part of the content is visible, or nothing when all
+    /// are there.
     std::optional<Task> nextTask(const Rect& visible) const;
-    /// Keeps what came of a task; without a picture the page is not asked for again.
+    /// Keeps the result of a task. Without a picture the page is not asked for again.
     void finish(const Task& task, std::optional<Image> picture, const Rect& visible);
-    void forgetPictures(); ///< what is kept is shown until it is drawn again
+    void forgetPictures(); ///< old pictures stay on the screen until they are drawn again
 
-    /// The picture of a page, perhaps too coarse; null: none yet.
+    /// Answers the picture of a page, which may be too coarse, or null when there is none yet.
     const Image* picture(std::size_t page) const;
     bool isBroken(std::size_t page) const;
     struct Detail {
@@ -68,7 +72,7 @@ public:
 
 private:
     struct Kept {
-        std::optional<Image> picture; ///< nothing: the page cannot be drawn
+        std::optional<Image> picture; ///< absent: the page cannot be drawn
         double pixelsPerPoint = 0; ///< 0: to be drawn again
     };
 

@@ -15,31 +15,31 @@
 
 namespace screens {
 
-/// What a preview shows of a document, ready to be put on the screen. A value.
+/// The content of a document's preview, ready to be put on the screen. A value.
 struct PreviewContent {
     enum class Kind {
         Image, ///< `picture`
         Text, ///< `text`
         Pages, ///< `pages`
-        Sound, ///< what lies at `path`
-        Film, ///< what lies at `path`
-        Summary, ///< icon, title and note (kind and size): there is no view for its type
-        InCloud, ///< as Summary: it is not downloaded
+        Sound, ///< a sound file at `path`
+        Film, ///< a film at `path`
+        Summary, ///< icon, title and note (kind and size), because the type has no view
+        InCloud, ///< a Summary of a document that is not downloaded
         Failure, ///< `note` says why nothing can be shown
     };
 
     Kind kind = Kind::Summary;
     Picture picture;
     std::string text;
-    bool isSource = false; ///< of a text: it has a language of its own, and letters of one width
+    bool isSource = false; ///< the text is source code, which has colours and letters of one width
     std::shared_ptr<PagedDocument> pages;
-    Size firstPage; ///< of pages, their own points
-    PagesRights rights; ///< of pages
-    std::optional<ItemVersion> version; ///< of pages: what was read
+    Size firstPage; ///< of Pages; page points
+    PagesRights rights; ///< of Pages
+    std::optional<ItemVersion> version; ///< of Pages: the version that was read
     std::string path, fileName;
     std::string iconName, title;
-    std::string note; ///< of a text or a picture: what is left out of it
-    bool canRetry = false; ///< of a failure: trying again may help
+    std::string note; ///< of a Text or an Image: says which part is left out
+    bool canRetry = false; ///< of a Failure: trying again may help
 };
 
 } // namespace screens

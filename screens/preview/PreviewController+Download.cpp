@@ -93,7 +93,7 @@ void PreviewController::startAgain()
     _isDownloadWanted = true;
     if (!_content)
         return;
-    // A failed download left the promise as it was.
+    // A failed download leaves the promise as it was.
     auto promised = *_content;
     promised.kind = PreviewContent::Kind::InCloud;
     promised.canRetry = false;
@@ -112,14 +112,14 @@ void PreviewController::leaveDownload()
 
 void PreviewController::downloadEnded(const std::optional<Error>& error)
 {
-    // The download calls this: it ends after that.
+    // The download itself calls this function, so it is destroyed only after the call.
     const auto ended = std::shared_ptr<ItemDownload>(std::move(_download));
     services().dispatch().mainQueue()->async([ended] {});
     if (!error) {
         load(previewLimitsForMainScreen());
         return;
     }
-    // Somewhere else: the list offers that, too.
+    // The download was cancelled from another screen, such as the list.
     if (error->is(FileErrorCode::Cancelled)) {
         _isDownloadWanted = false;
         if (_screen)

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// Changing the document that is shown, and what becomes of the edits.
+// This file lets the user change the document that is shown, and keeps the edits.
 
 #include "kit/controllers/NavigationController.h"
 #include "platform/Localization.h"
@@ -86,7 +86,7 @@ void PreviewController::editingBegan(const Result<Editing>& begun)
         return alert(
             messageAlert(localized("“%@” cannot be changed", {nameOf(*_item)}), whyNotChanged(*begun.error)));
     const auto& editing = *begun.value;
-    // A reading that is under way would put the document back that is not being changed.
+    // A load that is under way would replace the document being changed by the one without edits.
     cancelLoad();
     const auto& shown = _savedVersion ? _savedVersion : _content->version;
     if (shown == editing->versionRead())
@@ -131,7 +131,7 @@ void PreviewController::showEditBars()
     connectPreview();
 }
 
-/// Notes can be read also where nothing can be changed.
+/// Notes can be read also in a document that cannot be changed.
 void PreviewController::connectPages()
 {
     const auto pages = std::dynamic_pointer_cast<PreviewPagesView>(_previewView);
@@ -183,7 +183,8 @@ void PreviewController::keepEdits()
         keep(_editor->editing());
 }
 
-/// Leaves the document; `newItem` is what is shown next, perhaps the same document at another place.
+/// Stops changing the document and keeps its edits. `newItem` is shown next, and may be the same document at
+/// another place.
 void PreviewController::leaveEditing(const std::optional<Url>& newItem)
 {
     if (!_editor) {
@@ -225,7 +226,7 @@ void PreviewController::kept(const Editing& editing, const EditsKept& outcome)
             _savedVersion = outcome.version;
         return;
     case EditsKept::Where::Copy: {
-        // The document holds what the other program wrote; there is nothing of ours to go on with.
+        // The document now holds the other program's content, so these edits cannot be continued in it.
         const auto item = editing->item();
         if (isBeingEdited)
             removeEditor();
@@ -292,7 +293,7 @@ void PreviewController::keptCopy(const Editing& editing, const EditsKept& outcom
         localized("Your changes are kept"), localized("They are in a copy, “%@”.", {nameOf(outcome.place)})));
 }
 
-/// The edits are settled: where their document is still shown, it is shown without them.
+/// The edits were saved or discarded. If their document is still shown, it is shown as it is on the disk.
 void PreviewController::showOnDisk(const Editing& editing)
 {
     std::erase(_edited, editing);
@@ -303,7 +304,7 @@ void PreviewController::showOnDisk(const Editing& editing)
         refreshCurrentPreviewItem();
 }
 
-/// Something has happened to the document while it is being changed here.
+/// The document on the disk has changed while it is being changed here.
 void PreviewController::followChange()
 {
     const auto editing = _editor->editing();
@@ -319,7 +320,8 @@ void PreviewController::followChange()
     });
 }
 
-/// There is nobody any more who could be asked, nor a queue that would get to it.
+/// The program ends, so the edits are written at once: no alert could ask the user, and no queue would run
+/// any more.
 void PreviewController::programEnds()
 {
     if (_editor)
@@ -330,7 +332,7 @@ void PreviewController::programEnds()
     }
 }
 
-/// Over what is on the screen now, which may be another one by the time that something has gone wrong.
+/// Presents an alert over the current screen, because the user may have left this one before the failure.
 void PreviewController::alert(const std::shared_ptr<kit::ViewController>& alert)
 {
     const auto own = navigationController();

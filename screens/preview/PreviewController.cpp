@@ -30,7 +30,7 @@ namespace screens {
 
 namespace {
 
-/// A document that is read sooner never shows that it was loading.
+/// The screen shows that it is loading only after this time, because a short flash would disturb.
 constexpr auto loadingDelay = std::chrono::milliseconds(300);
 
 std::shared_ptr<PreviewSummaryView> summaryView(const PreviewSummaryView::Content& content)
@@ -106,7 +106,7 @@ void PreviewController::viewDidLoad()
 void PreviewController::viewWillAppear(bool animated)
 {
     ViewController::viewWillAppear(animated);
-    // Its content was forgotten, or its reading was given up, when it was left.
+    // The content was dropped or its load was cancelled when the user left the screen.
     if (_item && !_content && (!_cancelled || *_cancelled)) {
         load(previewLimitsForMainScreen());
         showLoadingAfterDelay();
@@ -125,7 +125,7 @@ void PreviewController::viewDidDisappear(bool animated)
     ViewController::viewDidDisappear(animated);
     if (_previewView)
         _previewView->stop();
-    // Under another screen it keeps its place.
+    // A screen that only lies under another one keeps its content and its place.
     const auto navigation = navigationController();
     if (!navigation || std::ranges::count(navigation->viewControllers(), shared_from_this()) == 0)
         close();
@@ -140,7 +140,7 @@ void PreviewController::didMoveToParentViewController(const std::shared_ptr<View
         showToolbar();
 }
 
-/// Ends all work, and keeps nothing of the document but where it is.
+/// Ends all work and keeps nothing of the document except its URL.
 void PreviewController::close()
 {
     leaveEditing();
@@ -190,7 +190,7 @@ void PreviewController::cancelLoad()
     ++_generation;
     if (_cancelled)
         *_cancelled = true;
-    // What has not begun yet goes with its queue.
+    // Work that has not begun is dropped with its queue.
     _queue = nullptr;
 }
 
@@ -202,7 +202,7 @@ void PreviewController::load(const PreviewLimits& limits)
     _queue = services().dispatch().makeOperationQueue("preview", QualityOfService::UserInitiated);
     _queue->addOperation([weak = std::weak_ptr(self()), item = *_item, limits, generation = _generation, main,
                              cancelled = _cancelled, saved = _savedVersion] {
-        // What was saved here is shown already.
+        // The screen already shows the version that was saved here.
         if (*cancelled || (saved && services().fileSystem().versionOfItem(item.path()) == saved))
             return;
         const auto content = std::make_shared<const PreviewContent>(
@@ -248,14 +248,14 @@ void PreviewController::show(std::shared_ptr<const PreviewContent> content)
 
 void PreviewController::showContent()
 {
-    // Before the screen is shown there is nothing to fill; viewDidLoad catches up.
+    // The view is not loaded yet; viewDidLoad shows the content later.
     if (!isViewLoaded())
         return;
     if (const auto preview = previewViewFor(*_content, _previewView))
         showPreview(preview);
     else if (!_download)
         showSummary();
-    // Who only had a glimpse at it has not asked for it.
+    // A document in a peek is not downloaded, because the user has not opened it.
     if (appearanceState() == kit::AppearanceState::Appeared)
         startDownload();
 }
@@ -263,13 +263,13 @@ void PreviewController::showContent()
 void PreviewController::showPreview(const std::shared_ptr<PreviewView>& preview)
 {
     _previewView = preview;
-    // The note of a recording is its kind and size.
+    // The note of a recording would repeat its kind and size, so it is left out.
     _screen->setNote(isMedia(*_content) ? std::string() : _content->note);
     _screen->setContent(preview);
     connectPreview();
 }
 
-/// A preview that another screen holds in miniature is only looked at.
+/// A preview in miniature has no toolbar, because the user only looks at it.
 void PreviewController::showToolbar()
 {
     const bool isMiniature = parent() && !navigationController();

@@ -40,9 +40,9 @@ struct EditsKept;
 struct PreviewContent;
 struct PreviewLimits;
 
-/// The screen that shows one document: a picture, a text, pages, sound or a film, or for everything else its
-/// icon with name, kind and size. Content is read off the main thread, within limits (see PreviewLoader).
-/// Main thread only.
+/// The screen that shows one document: a picture, a text, pages, a sound or a film. For every other type it
+/// shows the icon with name, kind and size. Content is read off the main thread, within limits (see
+/// PreviewLoader). Main thread only.
 class PreviewController : public kit::ViewController {
 public:
     PreviewController();
@@ -53,17 +53,18 @@ public:
 
     /// Asks the data source again and shows its first document.
     void reloadData();
-    /// Reads the document that is shown again; what is shown stays until the new content is there, and the
-    /// page, the zoom and the place after that.
+    /// Reads the current document again. The old content stays on the screen until the new one is there; the
+    /// page, the zoom and the place are kept.
     void refreshCurrentPreviewItem();
-    /// As of the last reload; nothing when the data source has no document.
+    /// Answers the document as of the last reload, or nothing when the data source has none.
     const std::optional<Url>& currentPreviewItem() const { return _item; }
 
-    /// Buttons at the right end of the navigation bar, the first one at the edge.
+    /// The buttons at the right end of the navigation bar, the first one at the edge.
     const kit::BarButtonItems& additionalRightBarButtonItems() const { return _additionalItems; }
     void setAdditionalRightBarButtonItems(kit::BarButtonItems items);
 
-    /// Opens a document elsewhere, beginning at a view of the screen. Without it no such button is offered.
+    /// Opens a document in another app, with a popover at a view of the screen. Without a handler no such
+    /// button is offered.
     using OpenInHandler = std::function<void(const Url& item, const std::shared_ptr<kit::View>& from)>;
     void setOpenInHandler(OpenInHandler handler);
 
@@ -75,23 +76,24 @@ public:
     void didMoveToParentViewController(const std::shared_ptr<ViewController>& parent) override;
     bool backRequested() override;
 
-    /// What is shown now; null until something is.
+    /// Answers the content that is shown, or null until there is one.
     const std::shared_ptr<const PreviewContent>& content() const { return _content; }
-    /// The view of the document's content; null for what has none.
+    /// Answers the view of the document's content, or null when the content has no view.
     const std::shared_ptr<PreviewView>& previewView() const { return _previewView; }
     const std::shared_ptr<PreviewScreenView>& screenView() const { return _screen; }
 
     void beginSearch();
     void endSearch();
 
-    /// Whether the person may change what is shown: the delegate and the document allow it.
+    /// Answers whether the user may change the document, which both the delegate and the document have to
+    /// allow.
     bool canEdit() const;
     void beginEditing();
-    /// Keeps the edits, and goes back to reading.
+    /// Keeps the edits and stops changing the document.
     void endEditing();
-    /// Keeps the edits that were made so far.
+    /// Keeps the edits that were made so far and goes on changing the document.
     void keepEdits();
-    /// Null unless the document is being changed.
+    /// Answers null unless the document is being changed.
     const std::shared_ptr<PreviewEditor>& editor() const { return _editor; }
 
     bool isDownloading() const { return _download != nullptr; }
@@ -99,7 +101,7 @@ public:
     void cancelDownload();
 
 private:
-    using Token = std::shared_ptr<std::atomic<bool>>; ///< true: the load is no longer wanted
+    using Token = std::shared_ptr<std::atomic<bool>>; ///< true: the load is cancelled
 
     void load(const PreviewLimits& limits);
     void cancelLoad();
@@ -145,20 +147,23 @@ private:
     std::optional<Url> _item;
     std::shared_ptr<const PreviewContent> _content;
     std::shared_ptr<PreviewScreenView> _screen;
-    std::shared_ptr<PreviewView> _previewView; ///< kept while a failure is shown, for the place in it
-    std::shared_ptr<PreviewSummaryView> _summary; ///< what is shown in place of content
+    std::shared_ptr<PreviewView>
+        _previewView; ///< kept while a failure is shown, because it knows the place in the document
+    std::shared_ptr<PreviewSummaryView> _summary; ///< shown in place of content
     std::unique_ptr<ItemDownload> _download;
     std::shared_ptr<PreviewEditor> _editor;
-    std::vector<std::shared_ptr<PreviewEditing>> _edited; ///< those whose edits may not be on the disk yet
-    bool _isEditingWanted = false; ///< the document is being read for it
-    std::optional<ItemVersion> _savedVersion; ///< what was saved here, which is shown already
-    std::weak_ptr<kit::NavigationController> _lastNavigation; ///< where to say what goes wrong afterwards
+    std::vector<std::shared_ptr<PreviewEditing>>
+        _edited; ///< the documents whose edits may not be on the disk yet
+    bool _isEditingWanted = false; ///< the document is being read so that it can be changed
+    std::optional<ItemVersion>
+        _savedVersion; ///< the version that was saved here, which the screen already shows
+    std::weak_ptr<kit::NavigationController> _lastNavigation; ///< where a later failure is reported
     std::vector<Observation> _observations;
-    bool _isDownloadWanted = true; ///< false once the person has stopped it
+    bool _isDownloadWanted = true; ///< false once the user has stopped the download
     kit::BarButtonItems _additionalItems;
     std::shared_ptr<OperationQueue> _queue;
     Token _cancelled;
-    unsigned _generation = 0; ///< of the latest load; an older one that ends is ignored
+    unsigned _generation = 0; ///< number of the latest load; the result of an older one is ignored
 };
 
 } // namespace screens

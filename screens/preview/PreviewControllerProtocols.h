@@ -12,7 +12,7 @@ namespace screens {
 
 class PreviewController;
 
-/// Answers what a preview shows. Main thread only.
+/// Answers the documents that a preview shows. Main thread only.
 class PreviewControllerDataSource {
 public:
     virtual ~PreviewControllerDataSource() = default;
@@ -23,13 +23,14 @@ public:
         const PreviewController& controller, std::size_t index) const = 0;
 };
 
-/// What the preview may do with a document. Main thread only.
+/// Decides what the preview may do with a document. Main thread only.
 class PreviewControllerDelegate {
 public:
     virtual ~PreviewControllerDelegate() = default;
     virtual bool previewControllerCanEditItem(const PreviewController&, const Url&) { return false; }
     virtual bool previewControllerShouldSaveEditedItem(const PreviewController&, const Url&) { return false; }
-    /// Whether sound and films play in the platform's media player; otherwise they show as icon and name.
+    /// Answers whether sounds and films play in the platform's media player. Otherwise they show as icon and
+    /// name.
     virtual bool previewControllerWantsDefaultMediaPlayer(const PreviewController&, const Url&)
     {
         return true;

@@ -15,7 +15,7 @@ class Button;
 
 namespace screens {
 
-/// What a person does to a document that is being changed.
+/// The tools with which the user changes a document.
 enum class EditTool { Undo, Highlight, Underline, Note, PreviousField, NextField, Done };
 
 /// The bar below a document that is being changed. Main thread only.
@@ -27,7 +27,7 @@ public:
     using kit::View::View;
 
     void setOnTool(std::function<void(EditTool)> callback) { _onTool = std::move(callback); }
-    /// What can be done now. Tools that the document has no use for are not shown at all.
+    /// Says which tools work now. Tools that do not apply to the document are not shown.
     struct State {
         bool canUndo = false, canMark = false, hasMarkable = false, hasFields = false;
     };

@@ -16,8 +16,8 @@ namespace screens {
 
 namespace {
 
-constexpr int mostCopies = 1000; ///< of one document
-/// A form of more pages is nobody's to fill in by hand.
+constexpr int mostCopies = 1000; ///< copies of one document
+/// Nobody fills in a form of more pages by hand, so its fields are not read.
 constexpr std::size_t mostPagesOfForm = 2000;
 
 /// "Plan.pdf" becomes "Plan 2.pdf".
@@ -32,7 +32,7 @@ std::string copyName(const std::string& name, int number)
 
 } // namespace
 
-/// What runs on the queue. It is kept by the work that waits, so that nothing that was asked for is lost.
+/// The work that runs on the queue. Waiting steps keep it alive, so that no requested step is lost.
 class PreviewEditing::Work : public std::enable_shared_from_this<Work> {
 public:
     Work(FileContent content, std::shared_ptr<PagedDocumentEditing> edited)
@@ -50,7 +50,7 @@ public:
         _queue->async([self = shared_from_this()] { self->runNext(); });
     }
 
-    /// Runs what waits, on this thread.
+    /// Runs the waiting steps on this thread.
     void finish()
     {
         while (runNext()) { }
@@ -72,7 +72,7 @@ public:
             item, ReadingOptions::ImmediatelyAvailableMetadataOnly, [&](const Url& location) {
                 auto version = services().fileSystem().versionOfItem(location.path());
                 if (version)
-                    version->changed = _content.version.changed; // tags are no content
+                    version->changed = _content.version.changed; // a changed tag is not a changed content
                 isSame = version == _content.version;
             });
         return !isSame;
@@ -80,7 +80,7 @@ public:
 
     const ItemVersion& version() const { return _content.version; }
 
-    /// Where the document lies: the other place, if it was moved there.
+    /// Answers where the document is: at the other place, if it was moved there.
     Url placeOf(const Url& item, const std::optional<Url>& other) const
     {
         const auto moved = other ? services().fileSystem().versionOfItem(other->path()) : std::nullopt;
@@ -124,7 +124,8 @@ private:
         return {EditsKept::Where::Document, item, std::nullopt, *replaced.value};
     }
 
-    /// The first copy has the document's own name, which is free when that has gone.
+    /// Writes a new document beside the original. The first copy has the original's own name, which is free
+    /// when the original is gone.
     static EditsKept writeCopy(const Url& item, const std::string& bytes, int firstNumber)
     {
         const auto folder = item.deletingLastPathComponent();
@@ -144,10 +145,10 @@ private:
     }
 
     std::shared_ptr<Queue> _queue = services().dispatch().makeSerialQueue("preview editing");
-    std::mutex _running; ///< held while a step runs
+    std::mutex _running; ///< locked while a step runs
     std::mutex _mutex;
     std::deque<std::function<void()>> _waiting;
-    FileContent _content; ///< what the disk held when it was looked at last; of the steps alone
+    FileContent _content; ///< the content on the disk at the last look; only steps use it
 };
 
 void PreviewEditing::begin(const Url& item, Opened opened)
@@ -184,7 +185,7 @@ PreviewEditing::PreviewEditing(Url item, std::shared_ptr<Work> work)
 {
 }
 
-/// Runs a step on the queue, and what it answers on the main thread.
+/// Runs a step on the queue and the step's answer on the main thread.
 void PreviewEditing::post(std::function<std::function<void()>()> step)
 {
     _work->post([step = std::move(step), main = services().dispatch().mainQueue()] { main->async(step()); });

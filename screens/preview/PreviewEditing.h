@@ -15,10 +15,10 @@
 
 namespace screens {
 
-/// Where edits are to go.
+/// The file into which edits are to be written.
 enum class EditsPlace { Document, Copy };
 
-/// What became of edits that were to be kept.
+/// The outcome of keeping edits.
 struct EditsKept {
     enum class Where {
         Document, ///< in the document itself
@@ -28,12 +28,12 @@ struct EditsKept {
     Where where = Where::Nowhere;
     Url place; ///< the document or the copy
     std::optional<Error> error;
-    ItemVersion version{}; ///< of the document, where it was saved
+    ItemVersion version{}; ///< the document's version after the save
 };
 
-/// A document that a preview changes: its edits, and their way to the disk. All work is done on a queue of
-/// its own, in order; callbacks come on the main thread. Main thread only. Work that was asked for goes on
-/// when this is let go.
+/// A document that a preview changes: it collects the edits and writes them to the disk. Work runs in order
+/// on a serial queue of its own and goes on when this object is released. Callbacks come on the main thread.
+/// Main thread only.
 class PreviewEditing : public std::enable_shared_from_this<PreviewEditing> {
 public:
     using Opened = std::function<void(const Result<std::shared_ptr<PreviewEditing>>&)>;
@@ -43,37 +43,37 @@ public:
     class Work;
     PreviewEditing(Url item, std::shared_ptr<Work> work); ///< use begin()
 
-    /// Reads a document to change it. Errors: those of FileSystem::contentToReplace() and
+    /// Reads a document to change it. The errors are those of FileSystem::contentToReplace() and
     /// PagedDocumentOpener::openForEditing().
     static void begin(const Url& item, Opened opened);
 
     const Url& item() const { return _item; }
-    /// The document as it is with its edits.
+    /// Answers the document with its edits.
     const std::shared_ptr<PagedDocument>& pages() const { return _pages; }
     const PagesRights& rights() const { return _rights; }
-    /// What lay on the disk when it was read.
+    /// Answers the version of the document that was read from the disk.
     const ItemVersion& versionRead() const { return _versionRead; }
 
     void apply(PageEdit edit, Stepped done);
     void undo(Stepped done);
     bool canUndo() const { return !_steps.empty(); }
-    /// Whether something was changed that is neither in the document nor in a copy.
+    /// Answers whether there are edits that are neither in the document nor in a copy.
     bool hasUnsavedEdits() const { return current() != _kept; }
-    /// All fields of the form, page by page.
+    /// Reads all fields of the form, page by page.
     void readFields(std::function<void(std::vector<FormField>)> completion);
-    /// Whether the document's content is another one than was read or saved here last.
+    /// Answers whether the document's content differs from the one that was last read or saved here.
     void checkItem(std::function<void(bool isChanged)> completion);
 
-    /// Puts the document with its edits in place of the one on the disk, unless another program has changed
-    /// that: then the edits go into a copy.
+    /// Replaces the document on the disk by the edited one. When another program has changed the document
+    /// meanwhile, the edits go into a copy instead.
     void save(Kept kept);
-    /// Keeps the edits in a new document beside it.
+    /// Writes the edits into a new document beside the original.
     void saveCopy(Kept kept);
-    /// The document may lie elsewhere now.
+    /// Says that the document may have been moved to another place.
     void follow(const Url& item) { _otherPlace = item; }
-    /// Gives the edits up.
+    /// Discards the edits.
     void discard() { _kept = current(); }
-    /// The same as save() or saveCopy(), at once: for when the program ends. Waits for the disk.
+    /// Does the same as save() or saveCopy() at once and waits for the disk, because the program ends.
     EditsKept keepNow(EditsPlace place);
 
 private:
@@ -87,9 +87,9 @@ private:
     std::shared_ptr<PagedDocument> _pages;
     PagesRights _rights;
     ItemVersion _versionRead;
-    std::vector<unsigned> _steps; ///< a number for each edit that is in force, in their order
+    std::vector<unsigned> _steps; ///< numbers of the edits in force, in their order
     unsigned _lastStep = 0;
-    unsigned _kept = 0; ///< the last step in what was kept
+    unsigned _kept = 0; ///< the last step that was saved
 };
 
 } // namespace screens

@@ -159,7 +159,7 @@ void PreviewEditor::undo()
 {
     if (!_editing->canUndo())
         return;
-    // What is being written is the last thing that was done.
+    // A text that is still being written is the latest edit, so it is finished first and then undone.
     finishWriting();
     _editing->undo([weak = weak_from_this()](const std::optional<Error>& error) {
         if (const auto editor = weak.lock())
@@ -216,7 +216,7 @@ void PreviewEditor::stepField(int direction)
     if (const auto* active = pages->activeField()) {
         index = static_cast<int>(active - fields.data());
     } else {
-        // The first one from the page on that is being read.
+        // The search for a field begins on the page that is being read.
         const auto here = std::ranges::find_if(
             fields, [&](const FormField& field) { return field.page >= pages->currentPage(); });
         index = static_cast<int>(here - fields.begin()) - (direction > 0 ? 1 : 0);
@@ -287,7 +287,7 @@ void PreviewEditor::pressField()
         fillIn(*field);
 }
 
-/// What a tap on a field does at once.
+/// Fills in a field as far as a tap decides its value.
 void PreviewEditor::fillIn(const FormField& field)
 {
     using Kind = FormField::Kind;

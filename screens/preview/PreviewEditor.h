@@ -19,14 +19,14 @@ namespace screens {
 
 class PreviewFieldBar;
 
-/// Lets a person change the pages that a preview screen shows: what the tools do, and what a tap means. Main
+/// Lets the user change the pages that a preview screen shows: it carries out the tools and the taps. Main
 /// thread only.
 class PreviewEditor : public std::enable_shared_from_this<PreviewEditor> {
 public:
     struct Callbacks {
-        std::function<void(const std::shared_ptr<kit::ViewController>&)> present; ///< an alert
-        std::function<void()> layoutDidChange; ///< the bar of a field came or went
-        std::function<void()> done; ///< the person is ready
+        std::function<void(const std::shared_ptr<kit::ViewController>&)> present; ///< presents an alert
+        std::function<void()> layoutDidChange; ///< the field's bar appeared or disappeared
+        std::function<void()> done; ///< the user pressed Done
     };
     static std::shared_ptr<PreviewEditor> create(std::shared_ptr<PreviewEditing> editing,
         const std::shared_ptr<PreviewPagesView>& pages, Callbacks callbacks);
@@ -37,14 +37,15 @@ public:
     const std::shared_ptr<PreviewEditing>& editing() const { return _editing; }
     const std::shared_ptr<PreviewEditBar>& bar() const { return _bar; }
     const std::shared_ptr<PreviewFieldBar>& fieldBar() const { return _fieldBar; } ///< hidden without a field
-    /// What the person is asked to do next, in words; empty: nothing.
+    /// Answers a sentence that asks the user for the next step; empty for none.
     std::string hint() const;
 
-    /// Shows the state of the view anew.
+    /// Shows the current state of the view.
     void update();
-    /// Puts what is being written into its field.
+    /// Puts the text that is being written into its field.
     void finishWriting();
-    /// The person asks to go back: from what is being done, not from the document. False: nothing was.
+    /// The user asks to go back: the current action ends, not the editing. Answers false when no action was
+    /// under way.
     bool backRequested();
 
 private:
@@ -74,10 +75,10 @@ private:
     std::shared_ptr<PreviewEditBar> _bar;
     std::shared_ptr<PreviewFieldBar> _fieldBar;
     PagesRights _rights;
-    bool _hasField = false; ///< one is being filled in
+    bool _hasField = false; ///< a field is being filled in
 };
 
-/// Shows a note that somebody has written, to be read.
+/// Answers an alert that shows the text of a note.
 std::shared_ptr<kit::ViewController> makeNoteAlert(const PageMark& mark);
 
 } // namespace screens

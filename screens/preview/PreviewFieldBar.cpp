@@ -21,7 +21,7 @@ bool isWritten(const FormField& field)
     return field.kind == FormField::Kind::Text && !field.isMultiline;
 }
 
-/// The first characters of a text, as many as a field takes.
+/// Answers as many of a text's first characters as a field takes.
 std::string cut(const std::string& text, std::size_t characters)
 {
     if (characters == 0)

@@ -21,8 +21,8 @@ class TextField;
 
 namespace screens {
 
-/// The bar in which the field of a form is filled in: its name, and what it holds. It stands above the
-/// keyboard, where the field itself may be hidden or too small to write in. Main thread only.
+/// The bar in which the user fills in a field of a form. It shows the field's name and value above the
+/// keyboard, because the field itself may be hidden or too small to write in. Main thread only.
 class PreviewFieldBar : public kit::View, private kit::TextFieldDelegate {
 public:
     static constexpr double barHeight = 72; ///< points
@@ -30,21 +30,25 @@ public:
     static std::shared_ptr<PreviewFieldBar> create();
     using kit::View::View;
 
-    /// Called when the person has written a text and goes on to the next field.
+    /// Called when the user has written a text and goes on to the next field.
     void setOnNext(std::function<void()> callback) { _onNext = std::move(callback); }
-    /// Called when the person leaves the field in which a text is written.
+    /// Called when the user leaves the field that is being written in.
     void setOnLeave(std::function<void()> callback) { _onLeave = std::move(callback); }
-    /// Called when the button is pressed that switches a box, or asks for a choice.
+    /// Called when the user presses the button that switches a check box or asks for a choice.
     void setOnPress(std::function<void()> callback) { _onPress = std::move(callback); }
 
-    /// Shows a field. A text that is being written is not touched by the same field once more.
+    /// Shows a field. Showing the same field again does not touch a text that is being written.
     void setField(const FormField& field);
-    /// What was written and is not in the field yet; nothing when it is. It counts as taken then.
+    /// Answers the text that was written and is not in the field yet, or nothing. The text counts as taken
+    /// from then on.
     std::optional<std::string> takeText();
 
     const std::shared_ptr<kit::Label>& nameLabel() const { return _name; }
-    const std::shared_ptr<kit::TextField>& textField() const { return _text; } ///< hidden for boxes
-    const std::shared_ptr<kit::Button>& button() const { return _button; } ///< hidden for texts
+    const std::shared_ptr<kit::TextField>& textField() const
+    {
+        return _text;
+    } ///< hidden for check boxes and choices
+    const std::shared_ptr<kit::Button>& button() const { return _button; } ///< hidden for text fields
 
     void layoutSubviews() override;
 
@@ -60,9 +64,9 @@ private:
     std::function<void()> _onNext, _onLeave, _onPress;
 };
 
-/// What a choice, a box or a button holds, in words.
+/// Answers the value of a choice, a check box or a button in words.
 std::string fieldValueWords(const FormField& field);
-/// The name of a field for people; never empty.
+/// Answers the name of a field in words; never empty.
 std::string fieldName(const FormField& field);
 
 } // namespace screens

@@ -123,7 +123,7 @@ PreviewContent textContent(PreviewContent content, const Reading& reading, bool 
 {
     const auto limit = reading.limits.maxTextBytes;
     std::ifstream file(content.path, std::ios::binary);
-    // One byte more than is shown tells whether there is more.
+    // One byte more than the limit is read, to see whether the file has more.
     std::string bytes(limit + 1, '\0');
     file.read(bytes.data(), static_cast<std::streamsize>(bytes.size()));
     if (!file.is_open() || file.bad() || (file.fail() && !file.eof()))
@@ -156,7 +156,8 @@ PreviewContent pagesContent(PreviewContent content)
 
 PreviewContent mediaContent(PreviewContent content, Kind kind)
 {
-    // The player reads it by itself, and tells less well what is the matter.
+    // The player reads the file by itself, but its message for an unreadable file is less clear, so this is
+    // checked first.
     if (!std::ifstream(content.path, std::ios::binary).is_open())
         return failure(std::move(content), unreadableWords(content.path));
     content.kind = kind;
@@ -171,7 +172,7 @@ PreviewContent readContent(const Url& url, const AttributeMap& values, const Rea
         content.note = localized("This document is in the cloud. It is not downloaded yet.");
         return content;
     }
-    // Opening anything but a regular file could wait for ever.
+    // Only a regular file is opened, because opening a pipe or a device could block for ever.
     const auto type = services().fileSystem().typeOfItem(url.path());
     if (!type)
         return failure(std::move(content), localized("It is no longer there."));

@@ -12,25 +12,24 @@
 
 namespace screens {
 
-/// How much of a document a preview reads.
+/// The limits within which a preview reads a document.
 struct PreviewLimits {
     int maxImageWidth = 4096, maxImageHeight = 4096; ///< pixels; larger pictures are shown smaller
-    std::uint64_t maxImagePixels = 0; ///< in all; 0: as the sides allow
+    std::uint64_t maxImagePixels = 0; ///< all pixels together; 0: no limit but the sides
     double imageScale = 1; ///< pixels to a point
-    std::size_t maxTextBytes = 1 << 20; ///< what is beyond is cut off, and the note says so
+    std::size_t maxTextBytes = 1 << 20; ///< a longer text is cut off, and the note says so
     std::size_t maxLineBytes = 4 << 10; ///< a longer line is cut off, and the note says so
 };
 
-/// What fills the main screen, and not more. Main thread.
+/// Answers limits that fill the main screen. Main thread.
 PreviewLimits previewLimitsForMainScreen();
-/// For a closer look at a picture: 24 million pixels.
+/// Answers limits for a closer look at a picture: 24 million pixels.
 PreviewLimits previewLimitsForCloseLook();
 
-/// Reads what a preview shows of a document, never fetching one that is not downloaded. Nothing but regular
-/// files is opened. Pictures of more than 100 million pixels or 256 MiB are refused, animations move up to 64
-/// MiB of frames, and of a text the first MiB is read (see ImageLimits and PreviewLimits). It takes as long
-/// as the reading; any thread. `isCancelled` is asked between the steps; after it answered true the content
-/// means nothing.
+/// Reads the content of a document's preview. It never downloads a document, and opens regular files only.
+/// It refuses pictures of more than 100 million pixels or 256 MiB, shows the frames of an animation up to 64
+/// MiB, and reads the first MiB of a text (see ImageLimits and PreviewLimits). It blocks while it reads; any
+/// thread. `isCancelled` is asked between the steps; when it has answered true, the content must not be used.
 PreviewContent loadPreview(
     const Url& url, const PreviewLimits& limits, const std::function<bool()>& isCancelled = {});
 

@@ -9,8 +9,8 @@
 
 namespace screens {
 
-/// Sound or a film in the platform's player, with its controls. It plays when the person starts it and stops
-/// when it is no longer seen.
+/// Plays a sound or a film in the platform's player, with controls. It plays when the user starts it and
+/// stops when it is no longer visible.
 class PreviewMediaView : public PreviewView {
 public:
     static constexpr const char* kindName = "preview.media";
@@ -23,7 +23,7 @@ public:
     struct Content {
         std::string path;
         std::string title;
-        std::string iconName; ///< stands for sound
+        std::string iconName; ///< the icon that is shown for a sound
         bool isFilm = false;
     };
     const Content& media() const { return _content; }

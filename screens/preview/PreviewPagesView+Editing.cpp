@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// What a person points at, and what is shown while the document is being changed.
+// This file finds what the user points at, and shows it while the document is being changed.
 
 #include "screens/preview/PreviewPagesView.h"
 
@@ -13,9 +13,9 @@ namespace screens {
 
 namespace {
 
-constexpr double fingerReach = 20; ///< content points around what a finger may mean
+constexpr double fingerReach = 20; ///< content points around a touch in which a target counts as hit
 
-/// How far a point is from a rectangle, the farther of both directions; 0 within it.
+/// Answers how far a point is from a rectangle, the larger of both directions, and 0 within it.
 double distance(const Rect& place, Point point)
 {
     const double across = std::max({place.x - point.x, point.x - place.maxX(), 0.0});
@@ -23,7 +23,7 @@ double distance(const Rect& place, Point point)
     return std::max(across, down);
 }
 
-/// The nearest thing within reach, of several the last; null: none.
+/// Answers the nearest thing within reach, the last of equal ones, or null.
 template <typename Thing>
 const Thing* nearest(const std::vector<Thing>& things, Point point, double reach)
 {

@@ -13,23 +13,23 @@ namespace screens {
 
 namespace {
 
-/// Searching stops at so many matches: more help nobody.
+/// The search stops at so many matches, because nobody can use more.
 constexpr std::size_t maxMatches = 10'000;
-/// A document has no more pages than can be laid out at once.
+/// Further pages are left out, because the layout of all pages is computed at once.
 constexpr std::size_t maxPages = 100'000;
-constexpr double aboveMatch = 0.3; ///< how far down the window a match is brought, of its height
+constexpr double aboveMatch = 0.3; ///< share of the window's height above a match that is scrolled to
 
 } // namespace
 
-/// Runs work on the document on a queue, and what it answers on the main queue if the document is still
-/// shown.
+/// Runs work on the document on a queue. If the document is still shown afterwards, it runs the work's answer
+/// on the main queue.
 void PreviewPagesView::post(std::function<std::function<void(PreviewPagesView&)>(const PagedDocument&)> work,
     const std::shared_ptr<Queue>& queue)
 {
     const auto self = std::static_pointer_cast<PreviewPagesView>(shared_from_this());
     queue->async([weak = std::weak_ptr(self), document = std::weak_ptr(_document), generation = _generation,
                      work = std::move(work), main = services().dispatch().mainQueue()] {
-        // The view alone keeps its document: one that is no longer shown is not worth a stroke.
+        // Only the view owns its document, so work for a document that is no longer shown is skipped.
         const auto open = document.lock();
         if (!open)
             return;
@@ -41,7 +41,7 @@ void PreviewPagesView::post(std::function<std::function<void(PreviewPagesView&)>
     });
 }
 
-/// What was to be done with the one before is dropped.
+/// Shows another object for the document. Work for the one before is dropped.
 void PreviewPagesView::take(std::shared_ptr<PagedDocument> document)
 {
     auto& dispatch = services().dispatch();
@@ -66,7 +66,7 @@ void PreviewPagesView::setDocument(std::shared_ptr<PagedDocument> document, Size
     take(std::move(document));
     const auto count = std::min(_document->pageCount(), maxPages);
     std::vector<Size> pages(count, firstPage);
-    // Until its own size is known, a page has the one that it had, else that of the first.
+    // Until a page's own size is known, it keeps its old size, else it has that of the first page.
     for (std::size_t page = 1; page < std::min(count, _deck.pageCount()); ++page) {
         const double points = _deck.pageFrame(0).width / firstPage.width;
         const auto frame = _deck.pageFrame(page);
@@ -164,7 +164,8 @@ void PreviewPagesView::drawNext()
 void PreviewPagesView::drew(const PageDeck::Task& task, std::optional<Image> picture)
 {
     _isDrawing = false;
-    // Only now: the first page that somebody waits for does not wait for the sizes of the others.
+    // The sizes of the other pages are read only now, because the first page that the user waits for comes
+    // first.
     if (!std::exchange(_knowsSizes, true))
         readPageSizes();
     _deck.finish(task, std::move(picture), _visible);
@@ -295,7 +296,8 @@ void PreviewPagesView::clearSelection()
     stateDidChange();
 }
 
-/// While one selection is read, only the latest that is wanted waits.
+/// Reads the latest selection that is wanted. While one selection is being read, earlier waiting ones are
+/// dropped.
 void PreviewPagesView::readSelection()
 {
     if (_isSelecting || !_wantedSelection || !_document)

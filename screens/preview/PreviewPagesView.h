@@ -22,9 +22,9 @@ class Queue;
 
 namespace screens {
 
-/// A document of pages to scroll through. Pages are drawn one at a time on a queue of the view's own, those
-/// that are seen first; work for a document that is no longer shown is dropped. "Content" points are those of
-/// the page deck.
+/// A document of pages to scroll through. Pages are drawn one at a time on a queue of the view's own, visible
+/// ones first. Work for a document that is no longer shown is dropped. "Content" points are those of the page
+/// deck.
 class PreviewPagesView : public PreviewView {
 public:
     static constexpr const char* kindName = "preview.pages";
@@ -34,9 +34,9 @@ public:
     {
     }
 
-    /// Shows a document. Where one was shown before, the place, the zoom and the search stay.
+    /// Shows a document. The place, the zoom and the search of an earlier document stay.
     void setDocument(std::shared_ptr<PagedDocument> document, Size firstPage);
-    /// Goes on with another object that holds the very same content.
+    /// Replaces the document by another object with the very same content.
     void continueWith(std::shared_ptr<PagedDocument> document);
     const PageDeck& deck() const { return _deck; }
 
@@ -47,55 +47,56 @@ public:
     std::size_t pageCount() const { return _deck.pageCount(); }
     std::size_t currentPage() const { return _currentPage; } ///< counted from 0
     void goToPage(std::size_t page);
-    /// The corner of what was seen last, in the content; nothing before it was seen.
+    /// Answers the top left corner of the part that was last visible, in content points, or nothing before
+    /// anything was visible.
     std::optional<Point> visiblePlace() const;
 
-    // Events up.
+    // Events up: the host reports what the native view shows.
     void userResized(double width, double scale);
     void userSees(const Rect& content);
     void nativeShowsZoom(double zoom); ///< lays the pages out for it
 
-    /// The matches of a page that are known so far, in page points.
+    /// Answers the known matches of a page in page points.
     const std::vector<Rect>& matchesOn(std::size_t page) const;
-    /// The match that is marked, in the content.
+    /// Answers the marked match in content points.
     std::optional<Rect> currentMatch() const;
     void showMatch(MatchStep step) override;
 
-    /// The pointer was drawn from one place of the content to another.
+    /// The user dragged the pointer from one place of the content to another.
     void userSelects(Point from, Point to);
     void clearSelection();
     const std::map<std::size_t, PageText>& selection() const { return _selection; }
     std::string selectedText() const;
 
-    /// A place on a page.
+    /// A point on a page, in page points.
     struct PagePlace {
         std::size_t page = 0;
         Point point;
     };
-    /// The person tapped on a place; Enter is a tap in the middle of what is seen.
+    /// The user tapped on a place. The return key taps in the middle of the visible part.
     void userTaps(Point content);
     void userPressesEnter();
     void setOnTap(std::function<void(const PagePlace&)> callback) { _onTap = std::move(callback); }
-    /// The mark at a place, the topmost of several, or the nearest that a finger may mean; called later, and
-    /// not when another document is shown by then.
+    /// Finds the mark at a place, the topmost of several, or the nearest within a finger's reach. The
+    /// callback comes later, and not when another document is shown by then.
     void findMark(const PagePlace& place, std::function<void(const std::optional<PageMark>&)> found);
-    /// The texts that are marked by the person, by page: what is selected, else the match of the search.
+    /// Answers the places to be marked, by page: the selected text, else the match of the search.
     std::map<std::size_t, std::vector<Rect>> chosenPlaces() const;
 
-    // While the document is being changed.
-    /// What is shown has changed in itself: it is drawn anew, and all else stays.
+    // These serve while the document is being changed.
+    /// The document's content has changed, so it is drawn again. Everything else stays.
     void documentDidChange();
-    /// The fields of its form, which are tinted, and the one that is being filled in, which is brought into
-    /// sight.
+    /// Sets the fields of the form, which are tinted. The field that is being filled in is scrolled into
+    /// view.
     void setFields(std::vector<FormField> fields);
     const std::vector<FormField>& fields() const { return _fields; }
     void setActiveField(std::optional<std::uint32_t> field);
     const FormField* activeField() const; ///< null: none
     const FormField* fieldAt(const PagePlace& place) const;
-    /// Whether the next tap says where something belongs.
+    /// Answers whether the next tap chooses the place of a note.
     bool isPlacing() const { return _isPlacing; }
     void setPlacing(bool placing);
-    /// Ctrl+Z was pressed.
+    /// The user pressed Ctrl+Z.
     void userWantsUndo();
     void setOnUndo(std::function<void()> callback) { _onUndo = std::move(callback); }
 
@@ -131,17 +132,18 @@ private:
     PageDeck _deck;
     Rect _visible;
     std::size_t _currentPage = 0;
-    unsigned _generation = 0; ///< of the document; what arrives for an older one is dropped
+    unsigned _generation = 0; ///< number of the shown document; results for an older one are dropped
     bool _isDrawing = false, _isSelecting = false, _knowsSizes = false;
     std::shared_ptr<Queue> _drawing, _reading;
 
     unsigned _searchGeneration = 0;
-    std::map<std::size_t, std::vector<Rect>> _matches; ///< only pages that have some
+    std::map<std::size_t, std::vector<Rect>> _matches; ///< only pages with matches
     std::optional<Match> _marked;
     std::size_t _matchCount = 0, _searchStart = 0;
 
     std::optional<SelectionEnds> _wantedSelection;
-    unsigned _selectionGeneration = 0; ///< of the latest clearing
+    unsigned _selectionGeneration =
+        0; ///< number of the latest clearing; a selection read before it is dropped
     std::map<std::size_t, PageText> _selection;
 
     std::vector<FormField> _fields;

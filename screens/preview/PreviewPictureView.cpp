@@ -17,7 +17,7 @@ void PreviewPictureView::setPicture(Picture picture)
 void PreviewPictureView::userSeesPixels(double width)
 {
     const int decoded = _picture.frames.empty() ? 0 : _picture.frames.front().image.pixelWidth();
-    // A little more than its pixels looks no different.
+    // A picture that is only a little larger than its pixels looks no different.
     constexpr double tolerance = 1.2;
     if (_asked || _picture.sourceWidth <= decoded || width <= decoded * tolerance)
         return;

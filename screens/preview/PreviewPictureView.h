@@ -26,10 +26,10 @@ public:
 
     bool canZoom() const override { return true; }
 
-    /// Called when the picture is shown larger than its pixels and the file has more of them; once for each
-    /// picture.
+    /// The callback runs when the picture is shown larger than its pixels and the file has more of them, once
+    /// for each picture.
     void setOnNeedsPixels(std::function<void()> callback) { _onNeedsPixels = std::move(callback); }
-    /// Event up: the native view shows the picture over so many device pixels.
+    /// Event up: the native view shows the picture this many device pixels wide.
     void userSeesPixels(double width);
 
 private:

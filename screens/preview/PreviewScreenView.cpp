@@ -72,7 +72,8 @@ void PreviewScreenView::setContent(const std::shared_ptr<kit::View>& content)
     if (_content)
         _content->removeFromSuperview();
     _content = content;
-    // Between the bars, so that the focus goes from top to bottom.
+    // The content stands between the bars in the order of views, so that the keyboard focus goes from top to
+    // bottom.
     if (_content)
         insertSubview(_content, 2);
     setNeedsLayout();
@@ -112,7 +113,8 @@ void PreviewScreenView::layoutSubviews()
         placeBelow(*_editBar, PreviewToolbar::barHeight);
     if (_barAbove)
         placeBelow(*_barAbove, PreviewFieldBar::barHeight);
-    // What is pointed at stays where it is when something is said about it.
+    // While the document is being changed, the note stands below the content, so that the content under the
+    // user's finger does not move.
     if (_editBar)
         placeBelow(*_note, noteHeight);
     else

@@ -17,8 +17,8 @@ namespace screens {
 class PreviewSearchBar;
 class PreviewToolbar;
 
-/// The whole of a preview's screen: search bar, a note on what is left out, the content, the toolbar, from
-/// top to bottom. Main thread only.
+/// The whole preview screen, from top to bottom: the search bar, a note on left-out parts, the content, the
+/// toolbar. Main thread only.
 class PreviewScreenView : public kit::View {
 public:
     static std::shared_ptr<PreviewScreenView> create();
@@ -26,7 +26,7 @@ public:
 
     const std::shared_ptr<PreviewSearchBar>& searchBar() const { return _searchBar; }
     const std::shared_ptr<PreviewToolbar>& toolbar() const { return _toolbar; }
-    /// Bars that stand below the content in place of the toolbar; null: none. A hidden one takes no room.
+    /// Sets the bars below the content in place of the toolbar; null means none. A hidden bar takes no room.
     void setEditBars(const std::shared_ptr<kit::View>& bar, const std::shared_ptr<kit::View>& barAbove);
     const std::shared_ptr<kit::View>& content() const { return _content; }
     void setContent(const std::shared_ptr<kit::View>& content); ///< null: none

@@ -20,7 +20,7 @@ namespace screens {
 
 namespace {
 
-/// Somebody who types on does not want what was typed so far.
+/// The search begins after a pause in typing, because matches of an unfinished word are of no use.
 constexpr auto typingPause = std::chrono::milliseconds(150);
 constexpr double margin = 6, buttonSide = 44, countWidth = 76;
 

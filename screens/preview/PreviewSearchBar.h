@@ -20,8 +20,8 @@ namespace screens {
 
 class PreviewView;
 
-/// The bar above a previewed document in which its text is searched: the field, how many matches there are,
-/// the one before and the one after. Main thread only.
+/// The bar above a previewed document in which the user searches its text: the field, the number of matches,
+/// and buttons for the match before and the match after. Main thread only.
 class PreviewSearchBar : public kit::View, private kit::TextFieldDelegate {
 public:
     static constexpr double barHeight = 48; ///< points
@@ -30,9 +30,9 @@ public:
     using kit::View::View;
 
     void setOnClose(std::function<void()> callback) { _onClose = std::move(callback); }
-    /// Searches this view from now on; null: nothing.
+    /// Searches this view from now on; null means none.
     void setPreview(const std::shared_ptr<PreviewView>& preview);
-    /// Shows the state of the search anew.
+    /// Shows the current state of the search.
     void update();
 
     const std::shared_ptr<kit::TextField>& field() const { return _field; }

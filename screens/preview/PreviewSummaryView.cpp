@@ -20,7 +20,7 @@ namespace {
 
 constexpr double margin = 24;
 constexpr double lineSpacing = 12;
-constexpr double symbolAlpha = 0.5; ///< of a plain symbol, which only goes with the words
+constexpr double symbolAlpha = 0.5; ///< pale, because the words carry the message
 constexpr double buttonHeight = 48, buttonWidth = 200;
 
 std::shared_ptr<kit::Label> makeLabel(const kit::Font& font)

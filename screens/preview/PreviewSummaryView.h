@@ -21,8 +21,8 @@ class StackView;
 
 namespace screens {
 
-/// What a preview shows in place of a document's content: its icon and name, what it is or what is the
-/// matter, how far a download has come, and what can be done. Main thread only.
+/// Stands in for a document's content: its icon and name, what kind it is or what went wrong, the progress of
+/// a download, and buttons. Main thread only.
 class PreviewSummaryView : public kit::View {
 public:
     struct Action {
@@ -31,15 +31,15 @@ public:
         bool isSuggested = false;
     };
     struct Content {
-        std::string iconName{}; ///< of the icon theme; empty: none
+        std::string iconName{}; ///< name of an icon in the icon theme; empty: none
         std::string title{}; ///< empty: none
         std::string message{}; ///< empty: none
-        bool isBusy = false; ///< with a spinner
-        std::optional<double> progress{}; ///< from 0 to 1, with a bar
+        bool isBusy = false; ///< shows a spinner
+        std::optional<double> progress{}; ///< 0 to 1; shows a bar
     };
 
     static std::shared_ptr<PreviewSummaryView> create();
-    static constexpr double maximumWidth = 420; ///< points, of the text
+    static constexpr double maximumWidth = 420; ///< points; the width of the text
     static constexpr double iconSide = 96; ///< points
     static constexpr double barWidth = 240, barHeight = 6; ///< points
 
@@ -48,7 +48,7 @@ public:
     const Content& content() const { return _content; }
     void setContent(const Content& content);
     const std::vector<std::shared_ptr<kit::Button>>& buttons() const { return _buttons; }
-    /// The buttons below the text, the first one on top.
+    /// Sets the buttons below the text, the first one on top.
     void setActions(const std::vector<Action>& actions);
 
 private:

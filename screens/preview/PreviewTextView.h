@@ -21,8 +21,8 @@ public:
 
     struct Content {
         std::string text; ///< UTF-8 without NUL characters
-        std::string fileName; ///< tells the language of a source
-        bool isSource = false; ///< with the colours of its language, in letters of one width
+        std::string fileName; ///< decides the language of source code
+        bool isSource = false; ///< shown with the colours of its language, in letters of one width
     };
     const Content& text() const { return _content; }
     void setText(Content content);

@@ -19,7 +19,7 @@ namespace screens {
 
 class PreviewView;
 
-/// The bar below a previewed document: search, the page, smaller and larger, as far as the document has them.
+/// The bar below a previewed document: search, page number, zoom buttons, as far as the document has them.
 /// Main thread only.
 class PreviewToolbar : public kit::View {
 public:
@@ -30,13 +30,13 @@ public:
 
     void setOnFind(std::function<void()> callback) { _onFind = std::move(callback); }
     void setOnEdit(std::function<void()> callback) { _onEdit = std::move(callback); }
-    /// Whether the document can be changed here.
+    /// Sets whether the document can be changed here.
     void setCanEdit(bool canEdit);
-    /// Shows and acts on this view from now on; null: nothing.
+    /// Shows this view's state and acts on it from now on; null means none.
     void setPreview(const std::shared_ptr<PreviewView>& preview);
-    /// Shows the view's state anew.
+    /// Shows the view's current state.
     void update();
-    bool isEmpty() const; ///< there is nothing to press
+    bool isEmpty() const; ///< no button is shown
 
     const std::shared_ptr<kit::Button>& findButton() const { return _find; }
     const std::shared_ptr<kit::Button>& copyButton() const

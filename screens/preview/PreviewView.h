@@ -17,31 +17,31 @@ namespace screens {
 
 enum class MatchStep { Next, Previous };
 
-/// How far a search in a document has come.
+/// The progress of a search in a document.
 struct SearchState {
     std::size_t matches = 0;
-    std::size_t current = 0; ///< counted from 1; 0: none is marked
+    std::size_t current = 0; ///< counted from 1; 0: no match is marked
     bool isComplete = true;
     bool operator==(const SearchState&) const = default;
 };
 
-/// The native view that shows a preview: calls down. Main thread.
+/// Calls down that a preview makes to its native view. Main thread.
 class PreviewViewObserver {
 public:
     virtual ~PreviewViewObserver() = default;
-    virtual void previewContentDidChange() { } ///< what is shown, or how large it is
-    virtual void previewNeedsDisplay() { } ///< nothing but how it looks
+    virtual void previewContentDidChange() { } ///< the content or its size
+    virtual void previewNeedsDisplay() { } ///< only its look
     virtual void previewZoomDidChange() { }
     virtual void previewQueryDidChange() { }
     virtual void previewShouldShowMatch(MatchStep) { }
     virtual void previewShouldScrollTo(const Rect& /*place in the content*/) { }
-    virtual void previewShouldStop() { } ///< it is no longer seen: nothing plays on
+    virtual void previewShouldStop() { } ///< it is no longer visible, so playing stops
     virtual void previewShouldTakeFocus() { }
-    virtual void previewShouldCopy() { } ///< what is selected, to the clipboard
+    virtual void previewShouldCopy() { } ///< copies the selection to the clipboard
 };
 
-/// The view of a document's content, with what its toolbar and keys act on. The host makes the native view by
-/// the kind. A new content of the same kind is put into the same view, which keeps place, zoom and search.
+/// The view of a document's content, and the commands of its toolbar and keys. The host makes the native view
+/// by the kind. New content of the same kind is put into the same view, which keeps place, zoom and search.
 /// Main thread only.
 class PreviewView : public kit::HostedView {
 public:
@@ -51,33 +51,33 @@ public:
 
     virtual bool canZoom() const { return false; }
     virtual bool canSearch() const { return false; }
-    /// Whether something is selected that only a command of ours copies.
+    /// Answers whether something is selected that the native view does not copy by itself.
     virtual bool canCopy() const { return false; }
 
     static constexpr double minZoom = 1, maxZoom = 12; ///< 1 fits the window
-    static constexpr double zoomStep = 1.5; ///< of the buttons and keys
+    static constexpr double zoomStep = 1.5; ///< factor of one press of a button or key
     double zoom() const { return _zoom; }
     void setZoom(double zoom); ///< by the program; kept within the limits
-    void userZoomed(double zoom); ///< event up: the native view shows this zoom now
+    void userZoomed(double zoom); ///< event up: the native view now shows this zoom
 
     const std::string& query() const { return _query; }
-    /// Looks for a text, whatever its case; the first match after the place that is shown is marked. Empty:
-    /// the search ends.
+    /// Searches for a text regardless of case and marks the first match after the visible place. An empty
+    /// text ends the search.
     void setQuery(std::string query);
     virtual void showMatch(MatchStep step);
     const SearchState& searchState() const { return _search; }
     void setSearchState(const SearchState& state);
 
-    void stop(); ///< it is no longer seen
+    void stop(); ///< it is no longer visible
     void takeFocus();
     void copy();
 
-    /// Called whenever what a toolbar shows of this view has changed.
+    /// The callback runs after every change that a toolbar shows.
     void setOnStateChange(std::function<void()> callback) { _onStateChange = std::move(callback); }
-    /// Called when the person presses the keys that begin a search.
+    /// The callback runs when the user presses the keys that begin a search.
     void setOnFind(std::function<void()> callback) { _onFind = std::move(callback); }
     void userWantsToFind();
-    /// Called with words when the native view finds that it cannot show the content.
+    /// The callback runs with a sentence when the native view cannot show the content.
     void setOnFailure(std::function<void(const std::string&)> callback) { _onFailure = std::move(callback); }
     void nativeFailed(const std::string& words);
 

@@ -11,8 +11,8 @@ namespace screens {
 
 class PreviewView;
 
-/// The view for a content: the one that shows the content before when it is of the same kind, so that place
-/// and zoom stay, else a new one. Null for what has no view of its own (a summary, a failure). Main thread.
+/// Answers the view for a content. It is the view before when the kind is the same, so that place and zoom
+/// stay, else a new one. Answers null for content without a view (a summary, a failure). Main thread.
 std::shared_ptr<PreviewView> previewViewFor(
     const PreviewContent& content, const std::shared_ptr<PreviewView>& before);
 

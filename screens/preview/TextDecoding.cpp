@@ -85,7 +85,8 @@ std::string fromUtf32(std::string_view bytes, ByteOrder order)
     return text;
 }
 
-/// The order of UTF-16 without a mark: in the usual scripts' spaces, digits and line ends one half is NUL.
+/// Guesses the byte order of UTF-16 without a byte-order mark: in the usual scripts one half of spaces,
+/// digits and line ends is NUL.
 std::optional<ByteOrder> guessedByteOrder(std::string_view bytes)
 {
     constexpr std::size_t looked = 4096, fewest = 8;
@@ -101,7 +102,7 @@ std::optional<ByteOrder> guessedByteOrder(std::string_view bytes)
     return isMany(1) ? std::optional(ByteOrder::LittleEndian) : std::nullopt;
 }
 
-/// What Windows-1252 has where Latin-1 has control characters; 0: nothing.
+/// The characters that Windows-1252 has in place of Latin-1's control characters; 0 means none.
 constexpr char16_t windowsSigns[32] = {0x20AC, 0, 0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021, 0x02C6,
     0x2030, 0x0160, 0x2039, 0x0152, 0, 0x017D, 0, 0, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022, 0x2013, 0x2014,
     0x02DC, 0x2122, 0x0161, 0x203A, 0x0153, 0, 0x017E, 0x0178};
@@ -118,7 +119,7 @@ std::string fromWindows1252(std::string_view bytes)
     return text;
 }
 
-/// The bytes without the beginning of a character at their end.
+/// Answers the bytes without an incomplete character at their end.
 std::string_view withoutCutCharacter(std::string_view bytes)
 {
     for (std::size_t back = 1; back <= std::min<std::size_t>(4, bytes.size()); ++back) {
@@ -131,7 +132,8 @@ std::string_view withoutCutCharacter(std::string_view bytes)
     return bytes;
 }
 
-/// Japanese mail switches between alphabets of ASCII bytes, which is well-formed UTF-8 as well.
+/// Answers whether the text switches between alphabets of ASCII bytes, as Japanese mail does. Such a text is
+/// well-formed UTF-8 as well.
 bool switchesAlphabets(std::string_view bytes)
 {
     return bytes.find("\x1B$") != std::string_view::npos;
