@@ -7,7 +7,7 @@
 
 namespace tarrow {
 
-/// Holds security-scoped access to a location for as long as it lives, where the location needs any.
+/// Holds security-scoped access to a location for as long as this object lives, when the location needs it.
 class AccessScope {
 public:
     explicit AccessScope(const Url& url)

@@ -77,7 +77,7 @@ bool DRItem::cacheValues()
     _resolvedURL = trw_URLByResolvingBookmark(_url);
     _isBookmark = promisedItems().isExternalDocumentReference(_url);
     if (!_resolvedURL)
-        return true; // a reference to nowhere gives no location that a reading could be coordinated for
+        return true; // the reference is broken, so there is no location to coordinate a read for
     return readCoordinated(Url(*_resolvedURL)) || initFromAttributes();
 }
 

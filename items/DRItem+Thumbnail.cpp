@@ -14,7 +14,7 @@ namespace tarrow {
 
 namespace {
 
-/// The one size that the screens show.
+/// The screens show thumbnails of this size only.
 constexpr int thumbnailPixelSize = 1024;
 
 struct ThumbnailSizes {

@@ -51,7 +51,8 @@ bool DRItem::isPromise() const
     return _promiseURL && !(_resolvedURL && _promiseURL->isSameObject(*_resolvedURL));
 }
 
-// Formatted when it is asked for: most records are read without anyone looking at the text of their size.
+// The text is formatted at the first question, because most records are read without anyone looking at their
+// size.
 std::string DRItem::friendlyFileSize() const
 {
     if (!_friendlySize)

@@ -18,27 +18,28 @@ enum class FileType;
 
 namespace tarrow {
 
-/// What is known of one item of the drive: a snapshot, read when it is built and again whenever its URL is
-/// replaced. An empty text, list or optional means that there is none.
+/// The attributes of one item of the drive: a snapshot, read when the record is built and again whenever its
+/// URL is replaced. An empty text, list or optional means that the item has no such attribute.
 ///
-/// A record has no lock. Its fields may be read on any thread, but not while it is being read anew.
+/// A record has no lock. Its fields may be read on any thread, but not while the record is being read again.
 class DRItem {
     struct Token {
         explicit Token() = default;
     };
 
 public:
-    /// Reads the item at a file URL; null when there is none or it cannot be read at all.
+    /// Reads the item at a file URL. Answers null when there is none or it cannot be read at all.
     static std::shared_ptr<DRItem> initWithURL(const Url& url);
-    /// Always throws std::invalid_argument: a record needs a URL.
+    /// Always throws std::invalid_argument, because a record needs a URL.
     [[noreturn]] static std::shared_ptr<DRItem> init();
     DRItem(Token, const Url& url);
 
-    /// The location that the record was built for. An equal one changes nothing, another one reads the record
-    /// anew.
+    /// The location for which the record was built. Setting an equal one changes nothing; setting another one
+    /// reads the record again.
     const Url& url() const { return _url; }
     void setUrl(const Url& url);
-    /// Where the contents really lie: references and promises resolved; for a link or an alias, its target.
+    /// The location of the contents, with references and promises resolved. For a link or an alias it is the
+    /// target.
     const std::optional<Url>& resolvedURL() const { return _resolvedURL; }
     void setResolvedURL(std::optional<Url> url) { _resolvedURL = std::move(url); }
     const std::string& localizedName() const { return _localizedName; }
@@ -47,7 +48,7 @@ public:
     void setTypeIdentifier(std::string type) { _typeIdentifier = std::move(type); }
     const std::string& localizedTypeDescription() const { return _localizedTypeDescription; }
     void setLocalizedTypeDescription(std::string text) { _localizedTypeDescription = std::move(text); }
-    /// Bytes; for a package without a size of its own, those of its contents.
+    /// The size in bytes. For a package without a size of its own it is the sum of its contents.
     std::optional<std::uint64_t> fileSize() const { return _fileSize; }
     void setFileSize(std::optional<std::uint64_t> size) { _fileSize = size; }
     /// The size as it was read, in the user's language.
@@ -59,68 +60,69 @@ public:
     void setContentModificationDate(std::optional<Date> date) { _contentModificationDate = date; }
     const std::optional<Url>& parentDirectoryURL() const { return _parentDirectoryURL; }
     void setParentDirectoryURL(std::optional<Url> url) { _parentDirectoryURL = std::move(url); }
-    /// The top folder of a document container.
+    /// Answers whether the item is the top folder of a document container.
     bool isContainer() const { return _isContainer; }
     void setIsContainer(bool value) { _isContainer = value; }
-    /// A folder that is no package.
+    /// Answers whether the item is a folder and not a package.
     bool isDirectory() const { return _isDirectory; }
     void setIsDirectory(bool value) { _isDirectory = value; }
     bool hasHiddenExtension() const { return _hasHiddenExtension; }
     void setHasHiddenExtension(bool value) { _hasHiddenExtension = value; }
-    /// Fetches the thumbnail when it is asked for first; once for each reading, even when there was none.
+    /// Fetches the thumbnail at the first question, once for each reading, even when there was none.
     const std::optional<Image>& thumbnail();
     void setThumbnail(std::optional<Image> image) { _thumbnail = std::move(image); }
     bool thumbnailFetched() const { return _thumbnailFetched; }
     void setThumbnailFetched(bool value) { _thumbnailFetched = value; }
     bool renameable() const { return _renameable; }
     void setRenameable(bool value) { _renameable = value; }
-    /// A reference to a document kept elsewhere.
+    /// Answers whether the item is a reference to a document elsewhere.
     bool isBookmark() const { return _isBookmark; }
     void setIsBookmark(bool value) { _isBookmark = value; }
     const std::vector<std::string>& tags() const { return _tags; }
     void setTags(std::vector<std::string> tags) { _tags = std::move(tags); }
-    /// Where the promise lies; the very same object as resolvedURL() when there is none.
+    /// The location of the promise. It is the very same object as resolvedURL() when there is no promise.
     const std::optional<Url>& promiseURL() const { return _promiseURL; }
     void setPromiseURL(std::optional<Url> url) { _promiseURL = std::move(url); }
     bool isDownloaded() const { return _isDownloaded; }
     void setIsDownloaded(bool value) { _isDownloaded = value; }
 
-    /// Judged by the identity of promiseURL() and resolvedURL(), not by their paths.
+    /// Compares the identity of promiseURL() and resolvedURL(), not their paths.
     bool isPromise() const;
-    /// The text of a symbolic link that only the plain file system could read.
+    /// The target of a symbolic link, as text, when only the plain file system could read the link.
     const std::string& symlinkTarget() const { return _symlinkTarget; }
     bool isPackage() const { return _isPackage; }
-    /// Kept from the last reading when a later one fails.
+    /// Keeps the value of the last successful reading when a later one fails.
     bool canPreview() const { return _canPreview; }
-    /// A symbolic link or an alias.
+    /// Answers whether the item is a symbolic link or an alias.
     bool isSymlink() const { return _isSymlink; }
 
-    /// Clears the record and reads it anew; false when the item could not be read. A reading that could not
-    /// be coordinated leaves the record cleared and counts as done.
+    /// Clears the record and reads it again. Answers false when the item could not be read. When the read
+    /// could not be coordinated, the record stays cleared and the answer is true.
     bool cacheValues();
     void clearValues();
     /// Reads the item from the plain file system, without coordination.
     bool initFromAttributes();
-    /// Fills the record from attributes read at a location.
+    /// Fills the record from attributes that were read at a location.
     void initFromKeysAndValuesWithURL(const AttributeMap& values, const Url& url);
-    /// The target of an alias file, found without asking the user and without mounting anything.
+    /// Answers the target of an alias file. It never asks the user and never mounts anything.
     std::optional<Url> resolvePathwellAlias(const Url& url);
 
-    /// A date in the user's language with the short time; nothing for no date.
+    /// Answers a date in the user's language with the short time, or nothing without a date.
     static std::optional<std::string> friendlyDateStyle(const std::optional<Date>& date, DateStyle style);
     std::optional<std::string> friendlyCreationDate(DateStyle style) const;
     std::optional<std::string> friendlyContentModificationDate(DateStyle style) const;
-    /// The summed bytes of everything below a folder, as promised where it is not here.
+    /// Answers the sum of the bytes of everything below a folder. Items that are not downloaded count with
+    /// their promised size.
     static std::uint64_t sizeOfPackage(const std::optional<Url>& url);
-    /// The record in one line, for logs.
+    /// Answers the record in one line, for logs.
     std::string description() const;
 
     /// Takes the 1024-pixel thumbnail of a thumbnail map; anything else changes nothing.
     void updateThumbnailImage(const std::optional<AttributeValue>& thumbnailMap);
     bool canGenerateThumbnail() const { return false; }
-    /// Calls back at once, on this thread, without an image.
+    /// Calls back at once on this thread, without an image.
     void generateThumbnail(const std::function<void(std::optional<Image>)>& completion) const;
-    /// The process's queue for fetching thumbnails, at background quality; made on first use.
+    /// Answers the process's queue for fetching thumbnails, at background quality. It is made on first use.
     static const std::shared_ptr<platform::OperationQueue>& getThumbnailQueue();
 
 private:

@@ -14,7 +14,7 @@ namespace tarrow {
 
 namespace {
 
-/// The number at the start of a text; one that is too large counts as the largest.
+/// Answers the number at the start of a text. One that is too large counts as the largest.
 std::optional<std::uint64_t> leadingNumber(std::string_view text)
 {
     text.remove_prefix(std::min(text.find_first_not_of(" \t\n\v\f\r"), text.size()));
@@ -39,7 +39,7 @@ std::string textOf(const Error& error)
 
 Result<DocumentIdentifiers::File> resolveDocumentId(std::uint64_t identifier)
 {
-    // The file system keeps 32 bits: a longer number must not be taken for the document with its low half.
+    // The file system stores 32 bits. A longer number must not be taken for the document with its lower half.
     if (identifier > std::numeric_limits<std::uint32_t>::max())
         return Error(platform::errorDomain::system, ENOENT);
     return documentIdentifiers().resolve(static_cast<std::uint32_t>(identifier));

@@ -11,14 +11,14 @@
 
 namespace tarrow {
 
-// The number that the drive keeps for a document while it is renamed and moved. Any thread.
+// The drive keeps a number for each document, which stays the same when it is renamed or moved. Any thread.
 
-/// The document identifier of the item at a URL, present or promised; 0 when it has none.
+/// Answers the document identifier of the item at a URL, present or promised, or 0 when it has none.
 std::int64_t trw_DocumentID(const Url& url);
 
-/// The current location of the document whose identifier stands, in decimal, at the start of the text
-/// (leading blanks and whatever follows the digits are passed over). Nothing for a missing text, a text
-/// without a number, a number of more than 32 bits, and a document that is not there any more.
+/// Answers the current location of the document whose identifier stands, in decimal, at the start of the
+/// text; leading blanks and everything behind the digits are skipped. Answers nothing for a missing text, a
+/// text without a number, a number of more than 32 bits, and a document that does not exist any more.
 std::optional<Url> trw_URLFromDocumentID(const std::optional<std::string>& documentID);
 
 } // namespace tarrow

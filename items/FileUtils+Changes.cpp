@@ -29,13 +29,13 @@ std::optional<Date> modificationDate(const Url& url)
     return date ? std::optional(*date) : std::nullopt;
 }
 
-/// What an item was when its deletion was asked for.
+/// The state of an item when its deletion was requested.
 struct KnownState {
     std::optional<Date> date;
     std::optional<platform::ItemVersion> version;
 };
 
-/// The accessor of a deletion: removes what is still as it was.
+/// Deletes the item in a coordinated write, if it is unchanged.
 std::optional<Error> removeUnchanged(const Url& location, const KnownState& before)
 {
     static constexpr Operation op{"+[FileUtils remove:]"};
@@ -52,7 +52,7 @@ std::optional<Error> removeUnchanged(const Url& location, const KnownState& befo
     return error;
 }
 
-/// The accessor of a move.
+/// Moves the item in a coordinated write and tells the presenters.
 std::optional<Error> moveAnnounced(const Url& source, const Url& destination)
 {
     static constexpr Operation op{"+[FileUtils move:to:]"};
@@ -69,7 +69,7 @@ std::optional<Error> moveAnnounced(const Url& source, const Url& destination)
     return std::nullopt;
 }
 
-/// Why the kinds of what is at both ends do not allow a move.
+/// Answers an error when the kinds of the items at both ends do not allow a move.
 std::optional<Error> refuseKinds(const Url& source, const Url& destination)
 {
     static constexpr Operation op{"+[FileUtils move:to:]"};
@@ -109,7 +109,7 @@ std::optional<Error> FileUtils::remove(const Url& url)
 {
     static constexpr Operation op{"+[FileUtils remove:]"};
     op.debug("Removing item: '%@'", url);
-    // The version is looked at first: a change between the two looks is then seen in the date.
+    // The version is read first, so that a change between the two reads shows in the date.
     const auto version = files().versionOfItem(url.path());
     const KnownState before{modificationDate(url), version};
     std::optional<Error> failed;

@@ -20,7 +20,7 @@ const platform::DocumentContainers& containers()
     return services().cloudDocumentService().containers();
 }
 
-/// How many names a location has below the root of all cloud documents.
+/// Answers how many names a location has below the root of all cloud documents.
 std::optional<std::size_t> depth(const std::optional<Url>& url)
 {
     const auto path = url ? containers().pathRelativeToSyncedRoot(*url) : std::nullopt;
@@ -65,7 +65,7 @@ std::optional<Error> splitPath(const Url& url, const DocumentContainer& containe
     return error;
 }
 
-/// Keeps the writing direction of a name from spilling into the line around it.
+/// Isolates the writing direction of a name, so that it does not affect the line around it.
 std::string isolated(const std::string& name)
 {
     return platform::formatText("\u2068%@\u2069", {name});

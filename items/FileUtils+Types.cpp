@@ -16,7 +16,8 @@ namespace {
 
 namespace typeIdentifier = platform::typeIdentifier;
 
-/// The content types that a container's documents may have, each once, in the order of their declaration.
+/// Answers the content types that a container's documents may have, each once, in the order of their
+/// declaration.
 std::vector<std::optional<std::string>> declaredContentTypes(const DocumentContainer& container)
 {
     std::vector<std::optional<std::string>> types;
@@ -46,7 +47,7 @@ bool accepts(const DocumentContainer& container, const std::string& extension, c
     return false;
 }
 
-/// The first code point of a well-formed text, taken off it.
+/// Removes the first code point of a well-formed text and answers it.
 char32_t takeCodePoint(std::string_view& text)
 {
     const auto lead = static_cast<unsigned char>(text.front());

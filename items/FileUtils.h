@@ -13,63 +13,65 @@
 
 namespace tarrow {
 
-/// What is done to files, and questions about them that change nothing.
+/// Operations on files, and questions about files that change nothing.
 ///
-/// Any thread; nothing is downloaded. What changes an item blocks until other readers and writers, in any
-/// process, let it, and never shows anything itself: it answers the error, or nothing.
+/// Any thread; nothing is downloaded. An operation that changes an item blocks until other readers and
+/// writers in any process have let it. It never shows anything itself: it answers the error, or nothing.
 class FileUtils {
 public:
     FileUtils() = delete;
 
-    /// Whether something exists at the URL's path, links followed.
+    /// Answers whether something exists at the URL's path. Links are followed.
     static bool exists(const Url& url);
-    /// Whether something exists there and is not a folder.
+    /// Answers whether something exists there that is not a folder.
     static bool isFile(const Url& url);
-    /// Whether a folder exists there.
+    /// Answers whether a folder exists there.
     static bool isDir(const Url& url);
-    /// The user's documents folder outside the drive; nothing when there is none.
+    /// Answers the user's documents folder outside the drive, or nothing when there is none.
     static std::optional<Url> docDir();
 
-    /// An attribute of an item, present or promised; where the promise gives none, that of the plain file.
-    /// Nothing for no URL and for an attribute without a value.
+    /// Answers an attribute of an item, present or promised. An attribute that the promise does not have is
+    /// read from the plain file. Answers nothing without a URL and for an attribute without a value.
     static std::optional<AttributeValue> getResourceValueForURL(
         AttributeKey key, const std::optional<Url>& url);
-    /// Logs the dates and the size of what lies at a path.
+    /// Logs the dates and the size of the item at a path.
     static void logFileAttributes(const std::string& path);
 
-    /// The content type of the name's extension; nothing without an extension or for an unknown one.
+    /// Answers the content type of the name's extension, or nothing without an extension or for an unknown
+    /// one.
     static std::optional<std::string> fileUTI(const Url& url);
-    /// Whether the name's extension is one of images, movies, sounds or PDF documents.
+    /// Answers whether the name's extension is one of images, movies, sounds or PDF documents.
     static bool isAudioVideoImageFile(const Url& url);
-    /// Whether a document of this name may live in the container that the URL lies in.
+    /// Answers whether a document of this name may lie in the container in which the URL lies.
     static bool isValidExtensionForContainer(const Url& url);
-    /// Whether a text (UTF-8) may be the name of an item. Its length is not judged.
+    /// Answers whether a text (UTF-8) may be the name of an item. The length is not checked.
     static bool isValidFilename(std::string_view name);
 
-    /// What stands between the names of a location line, blanks included.
+    /// Answers the separator between the names of a location line, blanks included.
     static std::string_view pathBarArrowCharacter(bool rightToLeft);
 
     /// Splits a location into its container and the names to show for the folders from the container's
     /// documents folder down to the item, the item's own name last (no list for the documents folder itself).
-    /// Each output is set only when it was asked for and could be found. An error may be answered beside set
-    /// outputs; FileErrorCode::Formatting when the location cannot be split.
+    /// Each output is set only when it was asked for and could be found. The answer is an error, even beside
+    /// outputs that are set, or nothing; FileErrorCode::Formatting means that the location cannot be split.
     static std::optional<Error> containerAndRelativePathforURLContainerRelativePathComponents(const Url& url,
         std::shared_ptr<const DocumentContainer>* container,
         std::optional<std::vector<std::string>>* relativePathComponents);
 
-    /// Where an item lies, as a line for the screen: the drive, the app library and the folders, without the
-    /// item's own name. Nothing when the location cannot be split.
+    /// Answers the location of an item as a line for the screen: the drive, the app library and the folders,
+    /// without the item's own name. Answers nothing when the location cannot be split.
     static std::optional<std::string> displayableLocationForURL(const Url& url);
 
-    /// Makes a folder, and those on the way to it that are missing.
+    /// Creates a folder and the missing folders above it.
     static std::optional<Error> mkdir(const Url& url);
-    /// Deletes an item for good, unless it was changed since this was called: then it is kept, and
-    /// FileErrorCode::Cancelled answered.
+    /// Deletes an item for good. If the item changed after this was called, it is kept and
+    /// FileErrorCode::Cancelled is answered.
     static std::optional<Error> remove(const Url& url);
-    /// Moves an item to a new location, its name included; so it renames, too. Moving it to where it is does
-    /// nothing. FileErrorCode::Unsupported when a folder is at a file's new location or a file at a folder's.
+    /// Moves an item to a new location whose last part is the item's new name, so this renames as well.
+    /// Moving an item to its own location does nothing. Answers FileErrorCode::Unsupported when a folder is
+    /// at a file's new location or a file at a folder's.
     static std::optional<Error> moveTo(const Url& source, const Url& destination);
-    /// Removes the downloaded copy of a cloud item. Whether no error was reported.
+    /// Removes the downloaded copy of a cloud item. Answers whether no error was reported.
     static bool evictDocument(const Url& url);
 };
 

@@ -62,7 +62,8 @@ std::optional<AppHandle> appInDefaultContainer(const Url& url, bool requireOpenI
     return app;
 }
 
-/// The app to open a document in when `owner` owns the container; `available` are the apps of the document.
+/// Answers the app that opens a document when `owner` owns the container; `available` are the document's
+/// apps.
 std::optional<AppHandle> appBesideOwner(
     const std::string& containerName, const AppHandle& owner, const std::vector<AppHandle>& available)
 {
@@ -154,7 +155,7 @@ bool LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(
     const auto resolved = app ? trw_URLByResolvingBookmark(url) : std::nullopt;
     if (!resolved)
         return false;
-    // Shared, because the action may run after this call.
+    // The flag is shared, because the action may run after this call has returned.
     const auto opened = std::make_shared<bool>(false);
     DocumentListController::openOutOfDriveViewControllerAction(*resolved, viewController, [=] {
         const auto sheet = DocumentInteractionSheet::interactionControllerWithURL(*resolved);

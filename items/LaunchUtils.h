@@ -17,28 +17,31 @@ class ViewController;
 
 namespace tarrow {
 
-/// Whether a document is opened in another app, and in which. No app means: show the preview. Main thread.
+/// Decides whether a document is opened in another app, and in which one. No app means that the preview is
+/// shown. Main thread.
 class LaunchUtils {
 public:
     using App = platform::AppHandle;
 
     LaunchUtils() = delete;
 
-    /// Opens a document in its default app; whether it was. The screen is where the platform may ask first.
-    static bool openInDefaultAppViewControllerRequireOpenIn(const Url& url,
-        const std::shared_ptr<kit::ViewController>& viewController, bool requireOpenIn);
+    /// Opens a document in its default app and answers whether it did. The platform may first ask on the
+    /// screen.
+    static bool openInDefaultAppViewControllerRequireOpenIn(
+        const Url& url, const std::shared_ptr<kit::ViewController>& viewController, bool requireOpenIn);
 
-    /// The app that a document, promised or here, is opened in; nothing when there is none. Images, movies,
-    /// sounds and PDF documents of the default container have none. In an app library the library's own app
-    /// comes before others. This program is never answered.
+    /// Answers the app that opens a document, promised or here, or nothing. Images, movies, sounds and PDF
+    /// documents of the default container have none. In an app library the library's own app comes before
+    /// others. This program is never answered.
     static std::optional<App> defaultAppForDocumentRequireOpenIn(const Url& url, bool requireOpenIn);
-    /// The localized name of that app.
+    /// Answers the localized name of that app.
     static std::optional<std::string> defaultAppNameForDocumentRequireOpenIn(
         const Url& url, bool requireOpenIn);
 
-    /// The apps that own the document's type and work on the document where it lies, in the registry's order.
+    /// Answers the apps that own the document's type and can open the document in its place, in the
+    /// registry's order.
     static std::vector<App> availableAppsForDoc(const platform::DocumentHandle& document);
-    /// Whether the names of a URL say that it lies in the default container.
+    /// Answers whether the names in a URL say that it lies in the default container.
     static bool isUrlInDefaultContainer(const Url& url);
 };
 

@@ -21,8 +21,8 @@ using Container = std::shared_ptr<const DocumentContainer>;
 using platform::FileSystem;
 using platform::FileType;
 
-/// The container of the folder that a list shows, and how many folders below its documents folder that lies;
-/// no container, and a line in the log, when it cannot be found.
+/// The container of the folder that a list shows, and the number of folders between its documents folder and
+/// the list's. When the container cannot be found it is null, and a line is logged.
 struct Place {
     Container container;
     std::size_t depth = 0;
@@ -41,8 +41,8 @@ Place placeOf(const MenuEnableChecks::List& list, const Operation& op)
     return {};
 }
 
-/// Whether a list may show special folders or containers, which lie right at the top of a container. Where
-/// none can be, a selection of 100,000 items need not be looked through.
+/// Answers whether a list may show special folders or containers, which only lie at the top of a container.
+/// For other lists a selection of 100,000 items need not be searched.
 bool mayShowSpecialItems(const MenuEnableChecks::List& list)
 {
     const auto& url = list.presentedURL();
@@ -57,7 +57,7 @@ bool isFolder(const Url& url)
     return values && values->flag(AttributeKey::IsDirectory) && !values->flag(AttributeKey::IsPackage);
 }
 
-/// The item that an entry of a folder stands for, when that may be a folder that is shown.
+/// Answers the item that an entry of a folder stands for, when that may be a visible folder.
 std::optional<Url> possibleFolder(const Url& entry, FileType type)
 {
     if (!entry.lastPathComponent().starts_with('.'))

@@ -10,7 +10,7 @@
 #include "platform/Log.h"
 #include "platform/Services.h"
 
-/// The platform's values, under the names by which the program speaks of them.
+/// The program uses the names of the platform's values without a prefix.
 namespace tarrow {
 
 using platform::AttributeKey;

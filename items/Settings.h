@@ -7,15 +7,15 @@
 
 namespace tarrow {
 
-/// What the program is set to.
+/// The program's fixed settings.
 class Settings {
 public:
     Settings() = delete;
 
-    /// Whether a tap on a document opens it at once.
+    /// Answers whether a tap on a document opens it at once.
     static constexpr bool quickLaunch() { return true; }
 
-    /// The type of the activity under which a viewed document is handed over to another device.
+    /// Answers the type of the activity that hands a viewed document over to another device.
     static constexpr std::string_view batonneTarrowActivityType() { return "BrindleDocsID.viewing"; }
 };
 

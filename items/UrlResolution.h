@@ -10,23 +10,24 @@
 
 namespace tarrow {
 
-// Where an item really lives, and what may be done with it there. Any thread; no call downloads anything.
+// These find the real location of an item and tell what may be done with it. Any thread; no call downloads
+// anything.
 
-/// The URL itself when it is no reference to a document elsewhere; else the logical location of the document
-/// that it refers to, or nothing when the reference cannot be read.
+/// Answers the URL itself when it is not a reference to a document elsewhere. Otherwise it answers the
+/// logical location of that document, or nothing when the reference cannot be read.
 std::optional<Url> trw_URLByResolvingBookmark(const Url& url);
 
-/// The logical location of a promise; the URL itself when it is none.
+/// Answers the logical location of a promise, or the URL itself when it is not a promise.
 Url trw_URLByResolvingPromise(const Url& url);
 
-/// Like trw_URLByResolvingBookmark(), but answers the URL itself for a reference that cannot be read.
+/// Works like trw_URLByResolvingBookmark(), but answers the URL itself for a reference that cannot be read.
 Url trw_URLByResolvingAlias(const Url& url);
 
-/// Whether this is the Desktop or the Documents folder at the top of the default container. Those two are
-/// never moved, renamed or deleted.
+/// Answers whether this is the Desktop or the Documents folder at the top of the default container. Those two
+/// are never moved, renamed or deleted.
 bool trw_isDesktopOrDocumentsFolder(const Url& url);
 
-/// Whether the destinations of a move may include other containers. The first item alone decides.
+/// Answers whether the destinations of a move may include other containers. The first item alone decides.
 bool trw_canCrossZoneMoveURLs(const std::vector<Url>& urls);
 
 } // namespace tarrow
