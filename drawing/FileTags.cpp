@@ -17,7 +17,7 @@ using platform::find;
 
 namespace {
 
-// The names under which the desktop's file manager keeps the table.
+// The desktop's file manager keeps the table under these names.
 constexpr auto tableKey = "PathwellTagDict";
 constexpr auto versionKey = "PathwellTagDictVersion";
 constexpr auto entriesKey = "PathwellTags";
@@ -30,7 +30,8 @@ struct Tags {
     std::vector<std::string> names;
 };
 
-/// What was read last; replaced as a whole, so that a reader sees one table or the other.
+/// Holds the table that was read last. It is replaced as a whole, so that a reader sees either the old or the
+/// new table.
 class Current {
 public:
     std::shared_ptr<const Tags> tags() const

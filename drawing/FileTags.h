@@ -12,24 +12,25 @@
 
 namespace tarrow {
 
-/// The tags that the account's devices share: their names, in the person's order, and their colours. The
-/// table is read when it is asked for first and again whenever the key-value store says that it has changed;
-/// nobody else is told of that. Any thread, but for the first call, which must come from the main thread.
+/// The tags that the account's devices share: their names in the user's order, and their colours. The table
+/// is read at the first question, and again whenever the key-value store says that it has changed; nobody
+/// else is told of such a change. Any thread, except that the first call must come from the main thread.
 class FileTags {
 public:
     using ColorsByTag = std::map<std::string, platform::Color, std::less<>>;
 
     FileTags() = delete;
 
-    /// A copy of the table's colours. A name that stands in the table twice has the later colour.
+    /// Answers a copy of the table's colours. A name that occurs twice in the table has the later colour.
     static ColorsByTag tagColorsByTag();
-    /// A copy of the table's names, in its order, with those that stand in it twice.
+    /// Answers a copy of the table's names in its order; a name that occurs twice is answered twice.
     static std::vector<std::string> allTags();
 
-    /// The colours that a table's entries choose from by their index; 0 is that of a tag without a colour.
+    /// Answers the colours from which a table's entries choose by their index; 0 means a tag without a
+    /// colour.
     static const std::array<platform::Color, 8>& _tagBlipColors();
-    /// Reads the table from the key-value store. One of another version than 2 counts as empty; an entry
-    /// without a name is left out; an index beyond the colours counts as 0.
+    /// Reads the table from the key-value store. A table whose version is not 2 counts as empty. An entry
+    /// without a name is left out, and an index beyond the colours counts as 0.
     static void _tagColorsDidChange();
 };
 
