@@ -12,12 +12,12 @@
 
 namespace tarrow {
 
-using platform::Operation;
-using screens::DocumentListController;
-using screens::StorageUpgradeButton;
 using kit::BarButtonItem;
 using kit::Font;
 using kit::SystemItem;
+using platform::Operation;
+using screens::DocumentListController;
+using screens::StorageUpgradeButton;
 
 namespace {
 
@@ -38,7 +38,7 @@ bool isToBeShown(const Offer& offer)
 std::shared_ptr<kit::Label> makePrimaryLabel()
 {
     auto label = std::make_shared<kit::Label>();
-    // The toolbar does not grow with the user's text size, so neither may the line in it.
+    // The toolbar does not grow with the user's text size, so the font of its line does not either.
     label->setFont(Font::preferred(kit::TextStyle::Caption2).fixed());
     label->setTextColor(platform::Color::black());
     label->sizeToFit();

@@ -25,7 +25,7 @@ public:
     virtual void upgradeStorageButtonPressed() = 0;
 };
 
-/// What the toolbar of one folder list shows: the status line and, while storage is low, the upgrade button.
+/// The content of one folder list's toolbar: the status line and, while storage is low, the upgrade button.
 /// Main thread.
 class DocumentListControllerStatusBar : public std::enable_shared_from_this<DocumentListControllerStatusBar> {
 public:
@@ -38,15 +38,15 @@ public:
     void configureLabels(const Offer& offer);
 
     void setStatusText(const std::string& text);
-    /// Gives the button an offer, and shows it when the offer says that storage is low.
+    /// Gives the button an offer, and shows the button when the offer says that storage is low.
     void showUpgradeOffer(const Offer& offer);
-    /// The button was pressed: its link's own action is performed; a link without one that leaves the upgrade
-    /// to the application is left to the delegate.
+    /// The user pressed the button. Its link's own action is performed. When the link has none and leaves the
+    /// upgrade to the application, the delegate is told.
     void upgradeStoragePressed(const screens::StorageUpgradeButton& button);
 
     const std::shared_ptr<DriveStatusLabelView>& labelsView() const { return _labelsView; }
     std::shared_ptr<DocumentListControllerStatusBarDelegate> delegate() const { return _delegate.lock(); }
-    /// Flexible space, the content, flexible space.
+    /// The toolbar's items: flexible space, the content, flexible space.
     const kit::BarButtonItems& toolbarItems() const { return _toolbarItems; }
 
 private:
@@ -55,13 +55,12 @@ private:
     kit::BarButtonItems _toolbarItems;
 };
 
-// The status bar of a folder list, which owns it.
+// These serve the status bar of a folder list. The list owns its status bar.
 
-/// Null before it is created.
-std::shared_ptr<DocumentListControllerStatusBar> statusBar(
-    const screens::DocumentListController& list);
-void setStatusBar(screens::DocumentListController& list,
-    std::shared_ptr<DocumentListControllerStatusBar> statusBar);
+/// Answers null before the status bar is created.
+std::shared_ptr<DocumentListControllerStatusBar> statusBar(const screens::DocumentListController& list);
+void setStatusBar(
+    screens::DocumentListController& list, std::shared_ptr<DocumentListControllerStatusBar> statusBar);
 /// Creates a status bar for the list, in place of an earlier one.
 void createStatusBarButtonPressDelegate(screens::DocumentListController& list,
     const DocumentListControllerStatusBar::Offer& offer,

@@ -16,7 +16,7 @@ using platform::Size;
 namespace {
 
 constexpr double gapToLabelHeight = 0.25;
-/// The line stands this much above the middle (points), which looks centred over a toolbar's lower edge.
+/// The line stands this much above the middle (points), which looks centred above a toolbar's lower edge.
 constexpr double lift = 1.0;
 
 Rect fittedFrame(kit::View* view)
@@ -36,7 +36,7 @@ Rect placed(Rect frame, double x, double y)
 
 } // namespace
 
-/// What the two views make up together: the line, and the button's title one gap below it.
+/// The size of both views together: the line, and the button's title one gap below it.
 struct DriveStatusLabelView::Block {
     double gap = 0, height = 0;
 };
@@ -118,7 +118,8 @@ Size DriveStatusLabelView::intrinsicContentSize(double) const
     if (!_showLowQuota || !_quotaButton)
         return {label.width, label.height + 2 * lift};
     const auto button = _quotaButton->sizeThatFits({});
-    // The button's frame hangs over its title: with the whole of it below the line nothing is cut off.
+    // The button's frame is higher than its title. The whole frame counts below the line, so that nothing is
+    // cut off.
     return {std::max(label.width, button.width),
         label.height * (1 + gapToLabelHeight) + button.height + 2 * lift};
 }

@@ -15,11 +15,11 @@
 
 namespace tarrow {
 
-using platform::localized;
 using kit::AlertAction;
 using kit::AlertActionStyle;
 using kit::AlertController;
 using kit::TextField;
+using platform::localized;
 
 namespace {
 
@@ -43,7 +43,7 @@ std::string trimmed(std::string_view text)
     return std::string(text);
 }
 
-/// What is wrong with a name as it is typed; nothing is said of an empty one.
+/// Answers what is wrong with a name while it is typed. An empty name gets no message.
 std::string complaintAbout(const std::string& name)
 {
     if (name.empty() || FileUtils::isValidFilename(name))
@@ -118,7 +118,7 @@ void FilenamePrompt::addCancelAction(std::function<void()> handler)
                 handler();
         });
     _alert->addAction(cancel);
-    // Nothing in its plain style says that it is the way out.
+    // The action's plain style does not mark it as the one that Escape presses.
     _alert->setEscapeAction(cancel);
 }
 
@@ -145,13 +145,13 @@ void FilenamePrompt::folderPromptTextFieldChanged(const TextField* field)
 
 bool FilenamePrompt::handleDoneAction()
 {
-    // An alert that is closing already may still see the return key.
+    // The return key may still arrive while the alert is closing.
     if (_alert->textFields().empty() || _isAccepted)
         return false;
     const auto name = trimmed(_alert->textFields().front()->text());
     if (!FileUtils::isValidFilename(name))
         return false;
-    // Whoever is asked may let the prompt go.
+    // The callback may release the prompt.
     const auto keepsSelf = shared_from_this();
     bool accepted = false;
     const auto message = _validateNewFilenameCallback(name, accepted);

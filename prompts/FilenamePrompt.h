@@ -19,20 +19,19 @@ namespace tarrow {
 
 class SimpleTextViewController;
 
-/// An alert in which the user types a name. It judges the name while it is typed, says in red what is wrong
+/// An alert in which the user types a name. It checks the name while it is typed, shows in red what is wrong
 /// with it, and stays open until the name is accepted or the user cancels.
 ///
-/// The caller presents the alert and keeps the prompt while it is shown: the alert knows the prompt only
-/// weakly, and closes for nothing but Cancel once the prompt is gone. Main thread.
-class FilenamePrompt : public kit::TextFieldDelegate,
-                       public std::enable_shared_from_this<FilenamePrompt> {
+/// The caller presents the alert and keeps the prompt alive while it is shown, because the alert refers to
+/// the prompt only weakly. Without the prompt the alert closes only on Cancel. Main thread.
+class FilenamePrompt : public kit::TextFieldDelegate, public std::enable_shared_from_this<FilenamePrompt> {
 public:
-    /// Called with the name, without white space around it, when the user confirms. Sets `accepted` to close
-    /// the prompt; otherwise the answer is shown (empty: no message) and the prompt stays.
+    /// Called with the name, without white space around it, when the user confirms. Setting `accepted` closes
+    /// the prompt. Otherwise the prompt stays open and shows the answer (empty: no message).
     using ValidateNewFilenameCallback = std::function<std::string(const std::string& name, bool& accepted)>;
     using MaybeText = std::optional<std::string>;
 
-    /// A new prompt. Without a text for the button it reads "Done". The callback is required.
+    /// Makes a prompt. Without a text for the button it reads "Done". The callback is required.
     static std::shared_ptr<FilenamePrompt> newWithTitleMessagePlaceholderFilenameDoneButtonTextCompletion(
         const MaybeText& title, const MaybeText& message, const MaybeText& placeholder,
         const MaybeText& filename, const MaybeText& doneButtonText, ValidateNewFilenameCallback completion);
@@ -47,18 +46,18 @@ public:
     }
     /// The confirming button.
     const std::shared_ptr<kit::AlertAction>& defaultAction() const { return _defaultAction; }
-    /// The name that the field begins with; nothing for a new folder.
+    /// The name with which the field begins; absent for a new folder.
     const MaybeText& origFilename() const { return _origFilename; }
     const ValidateNewFilenameCallback& validateNewFilenameCallback() const
     {
         return _validateNewFilenameCallback;
     }
 
-    /// The user confirms. Whether the alert may close.
+    /// The user confirmed. Answers whether the alert may close.
     bool handleDoneAction();
-    /// Shows a message in red; an empty one hides the area.
+    /// Shows a message in red. An empty one hides the area.
     void updateErrorMessage(const std::string& message);
-    /// The user edited the name; null does nothing.
+    /// The user edited the name. A null field is ignored.
     void folderPromptTextFieldChanged(const kit::TextField* field);
 
     bool textFieldShouldReturn(kit::TextField& field) override;

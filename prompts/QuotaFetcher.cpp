@@ -106,7 +106,7 @@ void QuotaFetcher::fetchUserQuotaWithCompletion(QuotaCompletion completion)
     }
     _quotaFetchingOperationsQueue->addOperation(account.makeQuotaFetchOperation(
         [completion = std::move(completion)](const platform::Result<std::int64_t>& result) {
-            // An account that holds more than it may has a negative number of bytes free: none.
+            // An account above its limit has a negative number of free bytes, which counts as 0.
             const auto bytes = std::max<std::int64_t>(0, result.value.value_or(0));
             completion(static_cast<std::uint64_t>(bytes), result.error);
         }));

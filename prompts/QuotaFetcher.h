@@ -17,27 +17,28 @@ namespace tarrow {
 
 class QuotaFetcher;
 
-/// Hears how much storage is free. Main thread.
+/// Is told how much storage is free. Main thread.
 class QuotaFetcherDelegate {
 public:
     virtual ~QuotaFetcherDelegate() = default;
-    /// Called after each fetch that succeeded, whether or not the number changed. Optional.
+    /// Called after each successful fetch, whether or not the number changed. Overriding it is optional.
     virtual void quotaFetcherDidUpdateValue(QuotaFetcher&, std::uint64_t /*freeBytes*/) { }
 };
 
-/// Asks the cloud document service, periodically and on demand, how many bytes of the drive are free. Nothing
-/// is asked while the application is inactive or nobody is signed in.
+/// Asks the cloud document service, periodically and on demand, how many bytes of the drive are free. It asks
+/// nothing while the application is inactive or nobody is signed in.
 ///
-/// Main thread, but for performFetch() and fetchUserQuotaWithCompletion(), which run on the fetcher's queue.
+/// Main thread, except for performFetch() and fetchUserQuotaWithCompletion(), which run on the fetcher's
+/// queue.
 class QuotaFetcher : public std::enable_shared_from_this<QuotaFetcher> {
     struct Private { };
 
 public:
-    /// Called with the free bytes and no error, or with an error. On a thread of the service's choosing.
+    /// Called with the free bytes and no error, or with an error, on a thread of the service's choosing.
     using QuotaCompletion =
         std::function<void(std::uint64_t freeBytes, const std::optional<platform::Error>&)>;
 
-    /// A fetcher without a timer, which may fetch and follows the application's state from now on.
+    /// Makes a fetcher without a timer, which may fetch and follows the application's state from now on.
     static std::shared_ptr<QuotaFetcher> init();
     explicit QuotaFetcher(Private);
     ~QuotaFetcher();
@@ -55,19 +56,20 @@ public:
     {
         return _quotaFetchingOperationsQueue;
     }
-    /// The running schedule; null before runWithInterval().
+    /// The running timer, or null before runWithInterval().
     const platform::Timer* timer() const { return _timer.get(); }
 
-    /// Fetches at once and then every `seconds`, each time at most one second late. Replaces an earlier
-    /// schedule.
+    /// Fetches at once and then every `seconds`, each time at most one second late. A further call replaces
+    /// the earlier schedule.
     void runWithInterval(double seconds);
-    /// Fetches once, soon.
+    /// Fetches once, as soon as the queue can.
     void fetchNow();
-    /// One attempt; the delegate hears of the value later, on the main thread. The fetcher's queue.
+    /// Makes one attempt, on the fetcher's queue. The delegate is told of the value later, on the main
+    /// thread.
     void performFetch();
     /// Asks the service. The completion is called once, or never when nobody is signed in. Any thread.
     void fetchUserQuotaWithCompletion(QuotaCompletion completion);
-    /// Keeps a value and tells the delegate.
+    /// Stores a value and tells the delegate.
     void notify(std::uint64_t freeBytes);
 
     void didBecomeActiveNotification();

@@ -12,18 +12,18 @@ class Label;
 
 namespace tarrow {
 
-/// A short message in red, as tall as its text, for the inside of an alert. Made with std::make_shared. Main
+/// A short message in red, as tall as its text, for the content of an alert. Made with std::make_shared. Main
 /// thread.
 class SimpleTextViewController : public kit::ViewController {
 public:
-    /// Null before the view is loaded.
+    /// Answers null before the view is loaded.
     const std::shared_ptr<kit::Label>& messageLabel() const { return _messageLabel; }
     kit::Font messageLabelFont() const;
 
     void viewDidLoad() override;
 
 private:
-    /// Points between the label and either side of the view.
+    /// Answers the points between the label and either side of the view.
     double _labelHorizontalInsets() const { return 16.0; }
     void constrainLabel();
 

@@ -10,10 +10,10 @@
 
 namespace tarrow {
 
-using platform::localized;
 using kit::AlertAction;
 using kit::AlertActionStyle;
 using kit::AlertController;
+using platform::localized;
 
 namespace {
 
@@ -22,9 +22,9 @@ using Pressed = std::shared_ptr<AlertAction>;
 constexpr Operation op{"+[UIUtils showDeleteWarningAlert:hasContainer:viewController:usingView:usingButton:"
                        "completion:]"};
 
-/// A line across the view's middle, from whose ends the popover's arrow may come.
-kit::PopoverAnchor anchorOf(const std::shared_ptr<kit::View>& view,
-    const std::shared_ptr<kit::BarButtonItem>& button)
+/// Answers a line across the view's middle, so that the popover's arrow may come from its ends.
+kit::PopoverAnchor anchorOf(
+    const std::shared_ptr<kit::View>& view, const std::shared_ptr<kit::BarButtonItem>& button)
 {
     if (!view)
         return std::weak_ptr(button);
@@ -55,8 +55,8 @@ std::shared_ptr<AlertAction> cancelAction(const UIUtils::DeleteCompletion& compl
 
 void UIUtils::showDeleteWarningAlertHasContainerViewControllerUsingViewUsingButtonCompletion(
     const std::vector<Url>& items, bool /*hasContainer*/, const Screen& parent,
-    const std::shared_ptr<kit::View>& view,
-    const std::shared_ptr<kit::BarButtonItem>& button, DeleteCompletion completion)
+    const std::shared_ptr<kit::View>& view, const std::shared_ptr<kit::BarButtonItem>& button,
+    DeleteCompletion completion)
 {
     const auto message = items.empty() ? std::nullopt : messageForDeletePrompt(items);
     if (!message || !parent) {

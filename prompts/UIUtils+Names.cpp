@@ -35,7 +35,7 @@ UIUtils::MaybeError UIUtils::renameItemAtURLToName(const Url& url, const std::st
         return Error(FileErrorCode::InvalidName);
     }
     op.debug("Name is valid: %@", name);
-    // A reference that cannot be read any more is an item like any other.
+    // A reference that cannot be read any more is renamed like any other item.
     const auto resolved = trw_URLByResolvingBookmark(url).value_or(url);
     if (services().cloudDocumentService().promisedItems().isExternalDocumentReference(url))
         op.debug("Renaming bookmark %@ (%@)", url, resolved);

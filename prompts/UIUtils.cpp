@@ -10,15 +10,15 @@
 
 namespace tarrow {
 
+using kit::AlertAction;
+using kit::AlertController;
 using platform::Error;
 using platform::FileErrorCode;
 using platform::localized;
-using kit::AlertAction;
-using kit::AlertController;
 
 namespace {
 
-/// The codes that are made without any information about the failure.
+/// Answers a message for an error's code without any details of the failure.
 std::string describeCode(const Error& error)
 {
     if (error.is(FileErrorCode::Unsupported))
@@ -44,7 +44,7 @@ std::string destinationName(const Error& error)
     return path && !path->empty() ? platform::Url::fileURL(*path).lastPathComponent() : std::string();
 }
 
-/// A name without its extension.
+/// Answers a name without its extension.
 std::string stemOf(const std::string& name, const std::string& extension)
 {
     return extension.empty() ? name : name.substr(0, name.size() - extension.size() - 1);

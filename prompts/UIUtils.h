@@ -23,8 +23,8 @@ struct TextRange;
 
 namespace tarrow {
 
-/// What the screens share to tell and ask the user something about an error, a name or a deletion. An alert
-/// is shown over its parent; without a parent it is not shown. Titles and messages may be empty. Main thread.
+/// The messages and questions about errors, names and deletions that several screens show. An alert is shown
+/// over its parent; without a parent it is not shown. Titles and messages may be empty. Main thread.
 class UIUtils {
 public:
     using Screen = std::shared_ptr<kit::ViewController>;
@@ -36,23 +36,23 @@ public:
     UIUtils() = delete;
 
     // Names.
-    /// Gives an item another name and keeps its extension, see computeNewURLNewBasename(); for a reference,
-    /// the document that it stands for. Nothing on success, also when it has that name already; InvalidName
-    /// for a name that cannot be one.
+    /// Gives an item another name and keeps its extension, see computeNewURLNewBasename(). For a reference it
+    /// renames the document that the reference stands for. Answers nothing on success, also when the item has
+    /// that name already, and InvalidName for a name that is not valid.
     static MaybeError renameItemAtURLToName(const platform::Url& url, const std::string& name);
-    /// Where an item will be under a new name. Its extension is appended, unless the new name ends with it,
-    /// whatever its letter case.
+    /// Answers the location of an item under a new name. The item's extension is appended unless the new name
+    /// already ends with it, regardless of case.
     static platform::Url computeNewURLNewBasename(const platform::Url& url, const std::string& name);
-    /// Puts the caret before the last dot; without one it stays where it is.
+    /// Puts the caret before the last dot. In a text without a dot the caret stays where it is.
     static void setCursorInTextFieldToBeforeExtension(kit::TextField& field);
     static void selectTextInTextFieldRange(kit::TextField& field, kit::TextRange range);
 
-    // Errors. Only an error's code is looked at, not its domain.
-    /// What a name prompt says about an error; empty without one.
+    // These show errors. Only an error's code counts, not its domain.
+    /// Answers the message that a name prompt shows for an error; empty without one.
     static std::string bestMessage(const MaybeError& error);
-    /// A failed move: the name is that of the error's destination.
+    /// Shows a failed move. The message names the error's destination.
     static void showFriendlyMoveErrorParentViewController(const platform::Error& error, const Screen& parent);
-    /// A failed rename to a name that the user typed.
+    /// Shows a failed rename to a name that the user typed.
     static void showFriendlyRenameErrorBasenameParentViewController(
         const platform::Error& error, const std::string& name, const Screen& parent);
     static void showFriendlyMoveOrRenameErrorBasenameMovingToDirParentViewController(
@@ -63,28 +63,28 @@ public:
     /// A message with the single button "OK".
     static void showAlertMessageParentViewController(
         const std::string& title, const std::string& message, const Screen& parent);
-    /// Why an operation failed, as the title: the error's description, else its failure reason. An error that
-    /// is not known is shown as one without either.
+    /// Shows why an operation failed, as the title: the error's description, else its failure reason. A
+    /// missing error is shown like one without either.
     static void showErrorParentViewController(const MaybeError& error, const Screen& parent);
-    /// That this is never done, for the folders that must stay as they are.
+    /// Says that the folders that must stay as they are cannot be changed.
     static void showUnsupportedError(const Screen& parent);
 
     // Deletion.
-    /// Asks before items are deleted: a sheet, on tablets a popover that points at the view's middle or,
-    /// without a view, at the button. Without items, or when nothing can be said about the one item, the
-    /// completion is called at once as cancelled. `hasContainer` (app libraries are among the items) changes
-    /// nothing here.
+    /// Asks before items are deleted: in a sheet, or on tablets in a popover that points at the view's middle
+    /// or, without a view, at the button. Without items, or when no message can be made for the one item, the
+    /// completion is called at once as cancelled. `hasContainer` (app libraries are among the items) has no
+    /// effect.
     static void showDeleteWarningAlertHasContainerViewControllerUsingViewUsingButtonCompletion(
         const std::vector<platform::Url>& items, bool hasContainer, const Screen& parent,
-        const std::shared_ptr<kit::View>& view,
-        const std::shared_ptr<kit::BarButtonItem>& button, DeleteCompletion completion);
-    /// What will be lost; nothing when the one item cannot be read or has no name. Reads that item.
+        const std::shared_ptr<kit::View>& view, const std::shared_ptr<kit::BarButtonItem>& button,
+        DeleteCompletion completion);
+    /// Answers the message that says what will be lost, or nothing when the one item cannot be read or has no
+    /// name. It reads that item.
     static std::optional<std::string> messageForDeletePrompt(const std::vector<platform::Url>& items);
 
-    /// Whether the device is a tablet.
+    /// Answers whether the device is a tablet.
     static bool tabulaMode();
-    /// Makes a screen a part of another one: its view becomes a subview of the parent's, in front of the
-    /// others.
+    /// Adds a screen to another one as a child. Its view becomes the front subview of the parent's.
     static void addChildViewControllerChildViewController(const Screen& parent, const Screen& child);
 };
 
