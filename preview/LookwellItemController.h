@@ -15,42 +15,42 @@ namespace tarrow {
 
 class PreviewItemManager;
 
-/// The quick preview: the screen that shows the content of the manager's item. There is one for the whole
-/// process. Main thread only.
+/// The quick preview: a screen that shows the content of the manager's item. The whole process has one. Main
+/// thread only.
 class LookwellItemController : public screens::PreviewController,
                                private screens::PreviewControllerDataSource,
                                private screens::PreviewControllerDelegate {
 public:
-    /// The process's one, made on the first call.
+    /// Answers the process's only controller, which is made on the first call.
     static std::shared_ptr<LookwellItemController> defaultController();
     static std::shared_ptr<LookwellItemController> init();
 
     LookwellItemController();
 
     std::shared_ptr<PreviewItemManager> itemManager() const { return _itemManager.lock(); }
-    /// The one document of the manager's item; nothing when it had none.
+    /// The document of the manager's item, in a list of one; absent when the manager had no item.
     const std::optional<std::vector<platform::Url>>& arrayOfDocuments() const { return _arrayOfDocuments; }
 
-    /// What a peek of the preview offers to do: nothing.
+    /// The actions that a peek of the preview offers. There are none.
     const kit::Menu& previewActionItems() const { return _previewActionItems; }
     void setPreviewActionItems(kit::Menu items) { _previewActionItems = std::move(items); }
 
     /// Makes a manager the current one and shows its item.
     void lookwellNewItem(const std::shared_ptr<PreviewItemManager>& manager);
 
-    /// Whether a location's name says that it is a PDF document.
+    /// Answers whether a location's name says that it is a PDF document.
     bool _lwPreviewItemIsPDFKind(const platform::Url& item) const;
 
-    /// Tells the manager that the screen goes.
+    /// Tells the manager that the screen disappears.
     void viewWillDisappear(bool animated) override;
 
-    // What the buttons in the navigation bar do.
+    // The buttons in the navigation bar call these.
     void showMoveTarget(const std::shared_ptr<kit::BarButtonItem>& sender);
     void showWarningAndDeleteDocument(const std::shared_ptr<kit::BarButtonItem>& sender);
 
 private:
     void addButtons();
-    /// What else can be done with a document that has no preview.
+    /// Offers other apps for a document that has no preview.
     void showOtherApps(const platform::Url& item, const std::shared_ptr<kit::View>& from);
     std::size_t numberOfPreviewItemsInPreviewController(
         const screens::PreviewController& controller) const override;

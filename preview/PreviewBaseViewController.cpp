@@ -22,8 +22,6 @@
 
 namespace tarrow {
 
-using platform::Operation;
-using screens::DocumentInteractionSheet;
 using kit::BarButtonItem;
 using kit::BarButtonItems;
 using kit::InterfaceOrientation;
@@ -31,12 +29,14 @@ using kit::LayoutConstraint;
 using kit::SizeClass;
 using kit::SystemItem;
 using kit::View;
+using platform::Operation;
+using screens::DocumentInteractionSheet;
 
 namespace {
 
-// The size of a phone's screen; the first layout pass replaces it.
+// The first frame has the size of a phone's screen, until the first layout replaces it.
 constexpr platform::Rect firstContentFrame{0, 0, 375, 667};
-/// Upright, the content ends this much above the bottom; points.
+/// In portrait orientation the content ends this much above the bottom; points.
 constexpr double portraitBottomMargin = 17;
 
 bool isPortrait(int orientation)
@@ -92,7 +92,7 @@ void PreviewBaseViewController::viewWillDisappear(bool animated)
     ViewController::viewWillDisappear(animated);
 }
 
-/// The constraints of one appearance hold for all later ones.
+/// Creates the constraints at the first appearance; they hold for all later ones.
 void PreviewBaseViewController::setupConstraints()
 {
     if (!navigationController() || _parentBottomConstraint)
@@ -110,7 +110,7 @@ void PreviewBaseViewController::setupConstraints()
     configureMargins();
 }
 
-/// A window may become a tablet's or a phone's while it is shown.
+/// The window may grow to a tablet's size or shrink to a phone's while the screen is shown.
 void PreviewBaseViewController::traitsDidChange(const kit::TraitCollection& previous)
 {
     ViewController::traitsDidChange(previous);
@@ -132,7 +132,7 @@ void PreviewBaseViewController::viewWillLayoutSubviews()
 platform::EdgeInsets PreviewBaseViewController::scrollViewDefaultEdgeInsets() const
 {
     platform::EdgeInsets insets;
-    // The shorter side is the status bar's thickness, however the device is held.
+    // The shorter side is the status bar's height, however the device is held.
     if (const auto& screen = kit::Screen::main())
         insets.top = std::min(screen->statusBarFrame.width, screen->statusBarFrame.height);
     if (const auto navigation = navigationController()) {

@@ -20,30 +20,30 @@ namespace tarrow {
 
 class PreviewItemManager;
 
-/// What the program's own preview screens have in common: content that scrolls between the bars, and the
-/// buttons to share, delete and move the item of the manager that made the screen. Main thread only.
+/// The common base of the program's own preview screens: content that scrolls between the bars, and buttons
+/// to share, delete and move the item of the manager that made the screen. Main thread only.
 class PreviewBaseViewController : public kit::ViewController {
 public:
     using Button = std::shared_ptr<kit::BarButtonItem>;
 
     std::shared_ptr<PreviewItemManager> itemManager() const { return _itemManager.lock(); }
     void setItemManager(std::weak_ptr<PreviewItemManager> manager) { _itemManager = std::move(manager); }
-    int mode() const { return _mode; } ///< the manager's
+    int mode() const { return _mode; } ///< the manager's mode
     void setMode(int mode) { _mode = mode; }
 
-    // Null before the view is loaded.
+    // These are null before the view is loaded.
     const std::shared_ptr<kit::ScrollView>& scrollView() const { return _scrollView; }
     const std::shared_ptr<kit::View>& contentView() const { return _contentView; }
-    /// Where subclasses put their content.
+    /// Subclasses add their content to this view.
     const std::shared_ptr<kit::View>& wrapperView() const { return _wrapperView; }
 
-    // The wrapper's edges against those of the content view; null before the first appearance.
+    // These tie the wrapper's edges to those of the content view. They are null before the first appearance.
     const auto& parentLeadingConstraint() const { return _parentLeadingConstraint; }
     const auto& parentTrailingConstraint() const { return _parentTrailingConstraint; }
     const auto& parentTopConstraint() const { return _parentTopConstraint; }
     const auto& parentBottomConstraint() const { return _parentBottomConstraint; }
 
-    // Made anew at each appearance; null before the first.
+    // The buttons are made again at each appearance. They are null before the first.
     const Button& barButtonActionItem() const { return _barButtonActionItem; } ///< Share
     const Button& barButtonDeleteItem() const { return _barButtonDeleteItem; }
     const Button& barButtonMoveItem() const { return _barButtonMoveItem; }
@@ -56,18 +56,18 @@ public:
     void traitsDidChange(const kit::TraitCollection& previous) override;
 
     void setupConstraints();
-    /// How much of the screen lies under the bars; points.
+    /// Answers how much of the screen lies under the bars; points.
     platform::EdgeInsets scrollViewDefaultEdgeInsets() const;
     void configureMargins();
-    /// An InterfaceOrientation's number; a narrow, high screen is always upright (1).
+    /// Answers the number of an InterfaceOrientation. A narrow, high screen always counts as portrait (1).
     int currentPseudoOrientation() const;
     void configureButtons();
-    /// The button that opens the item in another app, for the navigation bar of a phone; null: none.
+    /// Answers the button that opens the item in another app, for the navigation bar of a phone, or null.
     virtual std::shared_ptr<kit::Button> openInAppNavControllerButton() { return nullptr; }
-    /// The item may have changed. Overriders call this first.
+    /// The item may have changed. Classes that override this call it first.
     virtual void refreshItem();
 
-    // What the buttons do.
+    // The buttons call these.
     void openInDefaultApp();
     void showWarningAndDeleteDocument(const Button& sender);
     void showDocumentActivities(const Button& sender);
@@ -77,8 +77,7 @@ private:
     using Constraint = std::shared_ptr<kit::LayoutConstraint>;
 
     std::shared_ptr<PreviewBaseViewController> self();
-    Button makeButton(
-        kit::SystemItem symbol, void (PreviewBaseViewController::*action)(const Button&));
+    Button makeButton(kit::SystemItem symbol, void (PreviewBaseViewController::*action)(const Button&));
     Button wrappedOpenInButton();
     void enableButtons();
     bool hasItemURL() const;

@@ -13,13 +13,13 @@ class PlaceholderView;
 
 namespace tarrow {
 
-/// Describes one item: its icon, name, kind and size. Main thread only.
+/// Shows the description of one item: its icon, name, kind and size. Main thread only.
 class PreviewDetailsViewController : public PreviewBaseViewController {
 public:
     void viewDidLoad() override;
     void refreshItem() override;
 
-    /// Null before the view is loaded.
+    /// Answers null before the view is loaded.
     const std::shared_ptr<screens::PlaceholderView>& summaryView() const { return _summaryView; }
 
 private:

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// Moving and deleting the previewed item.
+// This file moves and deletes the previewed item.
 
 #include "items/DRItem.h"
 #include "items/FileUtils.h"
@@ -22,11 +22,11 @@ using screens::MoveTargetScope;
 
 namespace {
 
-/// Changes files where nothing waits for them: another program may hold an item, and the disk may be slow.
+/// Changes files on a queue of its own, because another program may hold an item and the disk may be slow.
 void changeFiles(platform::Work work)
 {
     const auto queue = services().dispatch().makeSerialQueue("TarrowDriveAppID.previewchanges");
-    // The work keeps its queue, so that what the user asked for happens though the preview goes away.
+    // The work keeps its queue alive, so that the user's change happens even if the preview is closed.
     queue->async([queue, work = std::move(work)] { work(); });
 }
 
@@ -46,7 +46,7 @@ std::vector<Error> moveAll(const std::vector<Move>& moves)
 
 } // namespace
 
-/// An alert needs a screen that is on the screen: the one that asked may be gone when a change has ended.
+/// Answers a visible screen for an alert, because the screen that asked may be gone when a change has ended.
 PreviewItemManager::Screen PreviewItemManager::screenForAlerts(const Screen& wanted) const
 {
     const auto navigation = navigationController();

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// The previewed document as something that the account's other devices can go on with.
+// This file offers the previewed document to the account's other devices.
 
 #include "items/DRItem.h"
 #include "items/Settings.h"
@@ -26,7 +26,7 @@ constexpr Operation op{"-[PreviewItemManager registerBatonneActivity]"};
 
 void logFailure(const Error& error)
 {
-    // What cannot be named for other devices is an ordinary thing.
+    // Not every document can be named for other devices, so this failure is expected.
     const bool isExpected =
         error.domain() == platform::errorDomain::cloud && error.code() == platform::notBookmarkableCode;
     if (isExpected)
@@ -59,7 +59,7 @@ void PreviewItemManager::registerBatonneActivity()
                 return;
             }
             main->async([weak, bookmark = *answer.value] {
-                // The bookmark may have been long in the making, and the item be no longer watched.
+                // Making the bookmark may have taken long, and the item may no longer be presented.
                 if (const auto self = weak.lock(); self && self->filePresenterRegistered())
                     self->registerBatonneActivityForBookmark(bookmark);
             });
@@ -80,7 +80,7 @@ void PreviewItemManager::registerBatonneActivityForBookmark(const std::string& b
     }
     auto& handOver = services().activityHandOver();
     handOver.becomeCurrent(activity);
-    // A deletion unregisters on another thread and may have come in between.
+    // A deletion unregisters on another thread and may have happened meanwhile.
     if (batonneActivity() != activity)
         handOver.resignCurrent(activity);
 }

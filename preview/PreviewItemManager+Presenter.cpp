@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// What others do to the previewed item, and how the preview follows.
+// This file follows the changes that other programs make to the previewed item.
 
 #include "items/DRItem.h"
 #include "platform/CloudDocumentService.h"
@@ -21,7 +21,7 @@ using platform::Url;
 
 namespace {
 
-/// Programs save in several steps; one reading after the last of them is enough.
+/// Programs save in several steps, so one reading after the last step is enough.
 constexpr auto refreshDelay = std::chrono::seconds(1);
 
 void reloadPreview()
@@ -153,7 +153,8 @@ void PreviewItemManager::presentedItemDidMoveToURL(const Url& newURL)
     });
 }
 
-/// What is only peeked at is kept ready at its new place; nobody asked to leave the list.
+/// Follows the item to its new place. A preview in a peek is only kept ready, because the user did not ask to
+/// leave the list.
 void PreviewItemManager::followTo(const Url& url)
 {
     const auto navigation = navigationController();
@@ -178,7 +179,8 @@ void PreviewItemManager::accommodatePresentedItemDeletionWithCompletionHandler(C
     });
 }
 
-/// A preview that was only prepared, or left meanwhile, has no screen that could go.
+/// Takes the preview off the stack. A preview that was only prepared, or was left meanwhile, has no screen
+/// there.
 void PreviewItemManager::popPreview()
 {
     const auto navigation = navigationController();

@@ -1,7 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// Which screen shows an item, and the way of the stack to it. The presenter, the actions and the hand-over
+// This file chooses the screen of an item and puts it on the stack. The presenter, the actions and the
+// hand-over have sources of their own.
 // have sources of their own.
 
 #include "preview/PreviewItemManager.h"
@@ -21,14 +22,14 @@
 
 namespace tarrow {
 
+using kit::NavigationController;
+using kit::SearchPresentation;
+using kit::ViewController;
 using platform::Notification;
 using platform::Operation;
 using platform::services;
 using platform::Url;
 using screens::DocumentListController;
-using kit::NavigationController;
-using kit::SearchPresentation;
-using kit::ViewController;
 
 namespace {
 
@@ -42,8 +43,9 @@ bool fileExists(const DRItem& item)
     return item.resolvedURL() && services().fileSystem().typeOfItem(item.resolvedURL()->path()).has_value();
 }
 
-/// The coordinator holds its presenters while it calls them, so the last one to let go may be any thread;
-/// what a manager ends (observations, screens) belongs to the main thread.
+/// Deletes a manager on the main thread. The coordinator holds its presenters while it calls them, so any
+/// thread may release the last reference, but the manager's observations and screens belong to the main
+/// thread.
 class EndOnMainThread {
 public:
     EndOnMainThread()

@@ -32,10 +32,10 @@ class DRItem;
 class LookwellItemController;
 class PreviewDetailsViewController;
 
-/// Coordinates the preview of one document: chooses its screen and puts it on the browser's stack, follows
-/// what other programs do to the document, moves and deletes it, and offers it to the account's other devices
-/// while it is shown. Main thread, but for the presenter's calls; it ends on the main thread, whoever drops
-/// it.
+/// Coordinates the preview of one document: it chooses the screen and puts it on the browser's stack, follows
+/// the changes of other programs, moves and deletes the document, and offers it to the account's other
+/// devices while it is shown. Main thread, except for the presenter's calls. It is destroyed on the main
+/// thread, whichever thread releases it.
 class PreviewItemManager : public platform::FilePresenter,
                            public screens::MoveTargetPickerDelegate,
                            public std::enable_shared_from_this<PreviewItemManager> {
@@ -45,13 +45,13 @@ public:
 
     static std::shared_ptr<PreviewItemManager> newItemManagerWithModeNavController(
         int mode, const std::shared_ptr<kit::NavigationController>& navigationController);
-    /// Without a navigation controller the manager prepares screens but shows none.
+    /// Makes a manager without a navigation controller, which prepares screens but shows none.
     static std::shared_ptr<PreviewItemManager> init();
 
     PreviewItemManager();
     ~PreviewItemManager() override;
 
-    /// Any thread.
+    /// May be called on any thread.
     std::shared_ptr<DRItem> item() const;
     int mode() const { return _mode; }
     void setMode(int mode) { _mode = mode; }
@@ -60,20 +60,18 @@ public:
         return _navigationController.lock();
     }
     void setNavigationController(std::weak_ptr<kit::NavigationController> navigationController);
-    /// The share sheet that was opened last; kept only so that it lives while it is shown.
-    const std::shared_ptr<screens::DocumentInteractionSheet>&
-    documentInteractionController() const
+    /// The share sheet that was opened last. It is held only to keep it alive while it is shown.
+    const std::shared_ptr<screens::DocumentInteractionSheet>& documentInteractionController() const
     {
         return _documentInteractionController;
     }
-    void setDocumentInteractionController(
-        std::shared_ptr<screens::DocumentInteractionSheet> sheet);
-    /// Where the presenter's calls arrive.
+    void setDocumentInteractionController(std::shared_ptr<screens::DocumentInteractionSheet> sheet);
+    /// The queue on which the presenter is called.
     const std::shared_ptr<platform::OperationQueue>& fcQueue() const { return _fcQueue; }
-    /// The content's date as it was seen last.
+    /// The content's modification date at the last look.
     const std::optional<platform::Date>& modifiedDate() const { return _modifiedDate; }
     bool refreshPending() const;
-    /// Null unless a details screen is shown or about to be.
+    /// Answers null unless a details screen is shown or about to be shown.
     const std::shared_ptr<PreviewDetailsViewController>& detailsViewController() const
     {
         return _detailsViewController;
@@ -82,39 +80,39 @@ public:
     /// Shows an item. Null only forgets the current one.
     void previewItem(const std::shared_ptr<DRItem>& item);
     void setItem(const std::shared_ptr<DRItem>& item);
-    /// With an item and `updatePreview` its screen is prepared and shown; otherwise it is only kept.
+    /// With an item and `updatePreview` the item's screen is prepared and shown; otherwise the item is only
+    /// stored.
     void setItemUpdatePreview(const std::shared_ptr<DRItem>& item, bool updatePreview);
-    /// Makes an item the current one and answers the screen that shows it; null when there is nothing to
+    /// Makes an item the current one and answers the screen that shows it, or null when there is nothing to
     /// show.
     Screen prepareToPreviewItem(const std::shared_ptr<DRItem>& item);
     std::shared_ptr<PreviewDetailsViewController> createDetailsViewController();
     std::shared_ptr<LookwellItemController> createLookwellController();
     std::shared_ptr<LookwellItemController> currentLookwellController() const;
-    /// Shows a screen in place of the preview on top of the stack, else on top of the stack; a search that
+    /// Shows a screen in place of the preview on top of the stack, else on top of the stack. A search that
     /// lies over the stack is dismissed first.
     void replaceLastViewController(const Screen& screen);
     bool isPreviewControllerDisplayed(const Screen& screen) const;
-    /// A preview screen tells that it goes.
+    /// A preview screen calls this when it disappears.
     void viewControllerWillDisappear(const kit::ViewController& screen);
 
-    /// The lists from the drive's top level to the folder of a URL; nothing when it leads to no folder of the
-    /// drive.
+    /// Answers the lists from the drive's top level to the folder of a URL, or nothing when the URL leads to
+    /// no folder of the drive.
     static std::optional<ListStack> dlcStackForURL(const platform::Url& url);
-    /// Replaces the whole stack by the lists that lead to a URL and, for a document, its preview. False, and
-    /// nothing changes, when there is no way to it.
+    /// Replaces the whole stack by the lists that lead to a URL and, for a document, its preview. Answers
+    /// false, and changes nothing, when no lists lead there.
     bool warpToNewURL(const platform::Url& url);
-    /// Reads the item anew from a URL and brings what is shown up to date.
+    /// Reads the item again from a URL and updates the screen that shows it.
     void refreshItem(const platform::Url& url);
 
-    // Actions of the preview screens. Files are changed off the main thread.
+    // The preview screens call these. Files are changed off the main thread.
     void showWarningAndDeleteDocumentBarButton(
         const Screen& screen, const std::shared_ptr<kit::BarButtonItem>& button);
     void showMoveTarget(const Screen& screen);
     void documentTargetSelectionControllerDidSelectItemAtURL(
-        const std::shared_ptr<screens::MoveTargetPicker>& picker,
-        const platform::Url& folder) override;
+        const std::shared_ptr<screens::MoveTargetPicker>& picker, const platform::Url& folder) override;
 
-    // The presenter: what others do to the item, while registered. Any thread.
+    // The file presenter follows what others do to the item while it is registered. Any thread.
     bool filePresenterRegistered() const;
     void registerAsFilePresenter();
     void unregisterAsFilePresenter();
@@ -126,7 +124,7 @@ public:
     void accommodatePresentedSubitemDeletionAtURLCompletionHandler(
         const platform::Url& url, CompletionHandler completion) override;
 
-    // Hand-over to other devices. Registering on the main thread.
+    // These hand the document over to other devices. Registering happens on the main thread.
     std::shared_ptr<const platform::UserActivity> batonneActivity() const;
     void registerBatonneActivity();
     void registerBatonneActivityForBookmark(const std::string& bookmark);
@@ -154,7 +152,7 @@ private:
     std::weak_ptr<kit::NavigationController> _navigationController;
     std::vector<platform::Observation> _observations;
 
-    mutable std::mutex _mutex; ///< of the fields below
+    mutable std::mutex _mutex; ///< guards the fields below
     std::shared_ptr<DRItem> _item;
     std::shared_ptr<const platform::UserActivity> _batonneActivity;
     bool _filePresenterRegistered = false;

@@ -5,7 +5,8 @@
 
 namespace tarrow {
 
-/// How a document is previewed: a signed integer, because it is kept in the saved state of the interface.
+/// How a document is previewed. The modes are signed integers, because they are stored in the saved state of
+/// the interface.
 inline constexpr int PreviewModeQuick = 0; ///< the shared quick preview
 inline constexpr int PreviewModeDetails = 1; ///< the details screen
 

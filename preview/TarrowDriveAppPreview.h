@@ -7,9 +7,9 @@
 
 namespace tarrow {
 
-// TarrowDriveAppPreview: what a preview asks a location.
+// TarrowDriveAppPreview: the question that a preview asks about a location.
 
-/// Whether sounds and films at this location play in the standard player: always.
+/// Answers whether sounds and films at this location play in the standard player. It is always true.
 inline bool wantsDefaultMediaPlayer(const platform::Url&)
 {
     return true;
