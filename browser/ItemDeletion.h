@@ -11,14 +11,14 @@
 
 namespace tarrow {
 
-/// What became of a deletion.
+/// The outcome of a deletion.
 struct DeletionOutcome {
     std::size_t failures = 0;
-    std::optional<Error> lastError; ///< nothing when the failures gave none
+    std::optional<Error> lastError; ///< absent when no failure answered an error
 };
 
-/// Deletes items and app libraries, one after the other, whatever happens to each. A library goes with
-/// everything in it, but for the drive's own container, which is never deleted. Blocks; main thread.
+/// Deletes items and app libraries one after the other; a failure does not end it. A library is deleted with
+/// everything in it. The drive's own container is never deleted. Blocks; main thread.
 DeletionOutcome deleteItems(const std::vector<Url>& urls);
 
 } // namespace tarrow

@@ -11,7 +11,7 @@ namespace tarrow {
 
 namespace {
 
-/// An item's path, with all that leads to the list's folder left out.
+/// Answers an item's path without the part that leads to the list's folder.
 std::string shortPath(const Url& item, const std::optional<Url>& folder)
 {
     const auto& path = item.path();

@@ -12,8 +12,8 @@ class DocumentListController;
 
 namespace tarrow {
 
-// What log lines say about a folder list. The texts are only made when the line is written, because a list
-// may have 100,000 items.
+// These values stand for texts about a folder list in log lines. The texts are only made when the line is
+// written, because a list may have 100,000 items.
 
 /// Reads as the URLs of a list's items; the list may be null.
 struct ContainedItems {

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// How a list's bars are configured, the line under it, and the choosing of several items.
+// This file configures a list's bars and the status line under it, and lets the user select several items.
 
 #include "browser/ListLogging.h"
 #include "browser/NavController.h"
@@ -18,18 +18,18 @@
 
 namespace tarrow {
 
+using kit::BarButtonItem;
+using kit::SystemItem;
 using platform::ByteCountStyle;
 using platform::ByteCountUnit;
 using platform::Operation;
 using platform::services;
 using screens::DocumentListAction;
 using screens::DocumentListController;
-using kit::BarButtonItem;
-using kit::SystemItem;
 
 namespace {
 
-/// What the list's title says while items are chosen.
+/// Answers the list's title while the user selects items.
 std::string selectionTitle(std::size_t selected)
 {
     return selected == 0

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// What is done to items: new folders, moves, new names and deletions, and who asks for them.
+// This file creates folders and moves, renames and deletes items, and asks the user before.
 
 #include "browser/ItemDeletion.h"
 #include "browser/NavController.h"
@@ -40,7 +40,7 @@ void call(const NavController::Completion& completion)
         completion();
 }
 
-/// Makes a folder that is not there yet.
+/// Creates a folder if it does not exist yet.
 std::optional<Error> makeFolder(const Url& folder, const Operation& op)
 {
     if (FileUtils::exists(folder)) {
@@ -50,7 +50,7 @@ std::optional<Error> makeFolder(const Url& folder, const Operation& op)
     return FileUtils::mkdir(folder);
 }
 
-/// What is said inside the prompt about items that could not follow into the new folder.
+/// Answers the prompt's message about items that could not be moved into the new folder.
 std::string messageAbout(const std::vector<Error>& errors)
 {
     return errors.size() == 1 ? UIUtils::bestMessage(errors.front())

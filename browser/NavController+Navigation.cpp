@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// The ways through the drive: taps, links, jumps from outside, search, peek and pop.
+// This file holds every way through the drive: taps, links, jumps from outside, search, peek and pop.
 
 #include "browser/NavController.h"
 #include "browser/PeekFolderViewController.h"
@@ -45,7 +45,8 @@ std::string described(const std::shared_ptr<DRItem>& item)
     return item ? item->description() : "(null)";
 }
 
-/// What a symbolic link leads to, one step further, when both ends lie in the drive's documents; else null.
+/// Answers the target of a symbolic link, one step further, when both ends lie in the drive's documents, else
+/// null.
 std::shared_ptr<DRItem> followLink(const DRItem& link, const Operation& op)
 {
     const auto& target = link.resolvedURL();
@@ -112,8 +113,8 @@ void NavController::dropItemManager()
 
 void NavController::replaceItemManager(int mode)
 {
-    // A list that is still moving in would be reported when the preview follows it, and take the manager
-    // along.
+    // The running transition is completed first. Otherwise a list that is still moving in would be reported
+    // after the preview follows it, and the report would drop the manager.
     completeTransition();
     dropItemManager();
     _itemManager = PreviewItemManager::newItemManagerWithModeNavController(mode, self());
@@ -124,7 +125,7 @@ void NavController::showPreviewPreviewMode(const std::shared_ptr<DRItem>& item, 
     if (!item)
         return;
     replaceItemManager(mode);
-    // The manager is kept by this call too: showing its screen may replace it.
+    // This call keeps the manager alive as well, because showing its screen may replace it.
     const auto manager = _itemManager;
     manager->previewItem(item);
 }
@@ -200,7 +201,7 @@ void NavController::documentListControllerDidSelectContainerWithViewController(
     }
     if (isSearchPresented()) {
         dismissViewController(true);
-        // What was found is shown in its real place in the drive.
+        // A search result is shown in its real place in the drive.
         if (warpToFolderForURL(*container->presentedURL()))
             return;
     }
@@ -240,7 +241,7 @@ void NavController::showVanishedItem(const Url& url)
 {
     const auto top = topViewController();
     UIUtils::showErrorParentViewController(vanished(url), top ? top : self());
-    // Later, so that the list ends its handling of the tap first.
+    // This runs later, so that the list first ends its handling of the tap.
     services().dispatch().mainQueue()->async([weak = std::weak_ptr(self())] {
         if (const auto browser = weak.lock())
             browser->setupInitialViewController();
@@ -262,7 +263,7 @@ void NavController::openDocument(const std::shared_ptr<DRItem>& item, const Oper
         return;
     }
     op.debug("openInDefaultApp returned NO, showing preview");
-    // Later, so that the list ends its handling of the tap first.
+    // This runs later, so that the list first ends its handling of the tap.
     services().dispatch().mainQueue()->async([weak = std::weak_ptr(self()), item] {
         if (const auto browser = weak.lock())
             browser->showPreviewPreviewMode(item, item->canPreview() ? PreviewModeQuick : PreviewModeDetails);

@@ -130,7 +130,7 @@ void NavController::setupUnavailableScreen()
         setViewControllers({screen}, false);
     } else {
         op.error("_DriveUnavailableScreen creation failed");
-        // Later, so that the alert comes after whatever the caller still does to the stack.
+        // This runs later, so that the alert comes after the caller's own changes of the stack.
         services().dispatch().mainQueue()->async([weak = std::weak_ptr(self())] {
             UIUtils::showAlertMessageParentViewController(
                 {}, platform::localized("Tarrow is not enabled"), weak.lock());
@@ -203,7 +203,7 @@ void NavController::offerChangedNotification()
         if (const auto bar = list ? statusBar(*list) : nullptr)
             bar->showUpgradeOffer(_upgradeOffer);
     }
-    // More storage that was just bought shows up in the quota with some delay.
+    // Storage that the user just bought appears in the quota with some delay.
     for (const int seconds : {1, 5, 20})
         fetchQuotaAfter(seconds);
 }

@@ -50,74 +50,63 @@ public:
 
     ~NavController() override;
 
-    // The edit mode's toolbar; null outside it.
-    const std::shared_ptr<kit::BarButtonItem>& barButtonNewFolder() const
-    {
-        return _barButtonNewFolder;
-    }
-    const std::shared_ptr<kit::BarButtonItem>& barButtonMoveItem() const
-    {
-        return _barButtonMoveItem;
-    }
-    const std::shared_ptr<kit::BarButtonItem>& barButtonDeleteItem() const
-    {
-        return _barButtonDeleteItem;
-    }
-    /// Whether several items are being chosen; lists then neither open nor navigate.
+    // These are the items of the edit mode's toolbar; they are null outside edit mode.
+    const std::shared_ptr<kit::BarButtonItem>& barButtonNewFolder() const { return _barButtonNewFolder; }
+    const std::shared_ptr<kit::BarButtonItem>& barButtonMoveItem() const { return _barButtonMoveItem; }
+    const std::shared_ptr<kit::BarButtonItem>& barButtonDeleteItem() const { return _barButtonDeleteItem; }
+    /// Answers whether the user is selecting several items. Lists then neither open items nor navigate.
     bool editMode() const { return _editMode; }
-    /// Whether a list has reported its contents since the last set-up; the status line waits for that.
+    /// Answers whether a list has reported its contents since the last set-up. The status line waits for
+    /// that.
     bool pickerIsAlive() const { return _pickerIsAlive; }
-    /// An enclosing split view, for its owner's use; null: none.
+    /// An enclosing split view, for its owner's use, or null.
     Screen splitViewController() const { return _splitViewController.lock(); }
     void setSplitViewController(const Screen& screen) { _splitViewController = screen; }
     /// The title of the list that was configured last.
     const std::string& viewTitle() const { return _viewTitle; }
-    /// When the free storage was heard of last; nothing before that.
+    /// The time of the last value of the free storage; absent before the first.
     const std::optional<platform::Date>& lastQuotaFetch() const { return _lastQuotaFetch; }
-    /// Null while the drive is not available.
+    /// Answers null while the drive is not available.
     const std::shared_ptr<QuotaFetcher>& quotaFetcher() const { return _quotaFetcher; }
     /// The manager of the current preview; null while a folder list is on top.
     const std::shared_ptr<PreviewItemManager>& itemManager() const { return _itemManager; }
     /// The name prompt that was shown last.
     const std::shared_ptr<FilenamePrompt>& folderPromptAlert() const { return _folderPromptAlert; }
     /// The share sheet that was shown last.
-    const std::shared_ptr<screens::DocumentInteractionSheet>&
-    documentInteractionController() const
+    const std::shared_ptr<screens::DocumentInteractionSheet>& documentInteractionController() const
     {
         return _documentInteractionController;
     }
     /// The completion of the last list action that deletes or shares.
     const Completion& performActionCompletionBlock() const { return _performActionCompletionBlock; }
     /// The storage upgrade that was started last.
-    const std::shared_ptr<screens::UpgradeFlow>& upgradeFlowMgr() const
-    {
-        return _upgradeFlowMgr;
-    }
-    /// Null: no offer.
+    const std::shared_ptr<screens::UpgradeFlow>& upgradeFlowMgr() const { return _upgradeFlowMgr; }
+    /// Answers null when there is no offer.
     const std::shared_ptr<const platform::StorageOffer>& upgradeOffer() const { return _upgradeOffer; }
     /// Free storage in bytes; 0 while the drive is not available.
     std::uint64_t quotaBytes() const { return _quotaBytes; }
 
-    // Set-up and account.
+    // The set-up and the account.
     void viewDidLoad() override;
-    /// Shows the drive's top level, or that the drive is not available; whatever was shown before is gone.
+    /// Shows the drive's top level, or the screen that says that the drive is not available, in place of the
+    /// whole stack.
     void setupInitialViewController();
-    /// Whether somebody is signed in.
+    /// Answers whether somebody is signed in.
     bool checkTarrowState() const;
-    /// Sets the browser up again when the account is not the one of the last time.
+    /// Sets the browser up again when the account is not the one of the last run.
     void handleAccountChanges();
-    /// Keeps the account's token for the next time; nothing: signed out.
+    /// Saves the account's token for the next run; nothing means signed out.
     void saveTarrowToken(const std::optional<platform::PropertyValue>& token);
     void didBecomeActiveNotification();
     void tarrowAccountAvailabilityChanged();
     void offerChangedNotification();
     void upgradeStorageButtonPressed() override;
     void quotaFetcherDidUpdateValue(QuotaFetcher& fetcher, std::uint64_t freeBytes) override;
-    /// Logs where the default container lies. For diagnosis; nothing calls it.
+    /// Logs the location of the default container. It serves diagnosis; nothing calls it.
     void logContainerURL() const;
 
-    // Lists and their status line.
-    /// The screen on top when it is a folder list; else null.
+    // Folder lists and their status line.
+    /// Answers the screen on top when it is a folder list, else null.
     List getTopDocumentListController() const;
     /// Configures a list that is about to be shown.
     void initNewListController(const List& list);
@@ -125,34 +114,35 @@ public:
     void configureToolbar(const List& list);
     /// Brings the status line of a list (null: the one on top) up to date.
     void updateStatusUI(const List& list);
-    /// The number of items and, once it is known, the free storage.
+    /// Answers a text with the number of items and, once it is known, the free storage.
     std::string toolbarStatusText(std::size_t itemCount) const;
     std::string quotaAvailableString() const;
     bool okToShowQuota() const { return _lastQuotaFetch.has_value(); }
 
-    // Edit mode: several items are chosen with check marks.
-    using Sender = std::shared_ptr<kit::BarButtonItem>; ///< what was pressed; null: nothing
+    // In edit mode the user selects several items with check marks.
+    using Sender = std::shared_ptr<kit::BarButtonItem>; ///< the button that was pressed; null: none
     void beginEditMode(const Sender& sender);
     void endEditMode(const Sender& sender);
     /// Selects everything that the list on top contains.
     void selectAllItems(const Sender& sender);
-    /// The one place that changes the mode; a null list changes the browser alone.
+    /// Every change of the mode goes through here. With a null list only the browser changes.
     void setEditModeAndUpdateUIForViewController(bool editMode, const List& list);
     /// Configures the bars of the list on top for the mode.
     void configureVisibleControllerForMode();
 
-    // Saved state: the previewed item and its preview mode.
+    // The saved state is the previewed item and its preview mode.
     void encodeRestorableStateWithCoder(platform::StateCoder& coder) override;
     void decodeRestorableStateWithCoder(const platform::StateCoder& coder) override;
 
     // Navigation.
     void navigationControllerDidShowViewControllerAnimated(
         NavigationController&, const Screen& screen, bool animated) override;
-    /// Replaces the whole stack by the way to an item of the drive and, for a document, its preview. False,
-    /// and the stack stays, for no URL, one outside the drive's documents or in its trash, and one without a
-    /// way to it.
+    /// Replaces the whole stack by the lists that lead to an item of the drive and, for a document, its
+    /// preview. Answers false, and keeps the stack, without a URL, for one outside the drive's documents or
+    /// in its trash, and for one to which no lists lead.
     bool warpToNewURLPreviewMode(const std::optional<platform::Url>& url, int mode);
-    /// Replaces the whole stack by the lists that lead to a folder; false, and it stays, when none do.
+    /// Replaces the whole stack by the lists that lead to a folder. Answers false, and keeps the stack, when
+    /// none do.
     bool warpToFolderForURL(const platform::Url& url);
     /// Shows an item in a preview; null does nothing.
     void showPreviewPreviewMode(const std::shared_ptr<DRItem>& item, int mode);
@@ -161,7 +151,7 @@ public:
     /// Opens the item of a peek.
     void knopPopToURL(const platform::Url& url);
 
-    // What a folder list reports.
+    // The folder lists report these events.
     void documentListControllerDidSelectContainerWithViewController(
         const List& list, const List& container) override;
     void documentListControllerDidSelectItemAtURL(const List& list, const platform::Url& url) override;
@@ -178,38 +168,39 @@ public:
     std::vector<platform::Color> documentListControllerColorsForTagNames(
         const List& list, const std::vector<std::string>& names) override;
 
-    // Item actions. The file operations block until they are done.
+    // These act on items. The file operations block until they are done.
     /// Asks for the name of a new folder in the folder of the list on top.
     void promtForNewFolderAndCreate(const Sender& sender);
-    /// Asks for the name of a new folder, and moves items into it once it is made.
+    /// Asks for the name of a new folder, creates it and moves items into it.
     void showNewFolderPromptDuringMoveItemsToMove(
         const std::optional<platform::Url>& folder, const std::vector<platform::Url>& items);
-    /// Asks where the selected items of the list on top shall go.
+    /// Asks for the destination of the selected items of the list on top.
     void showMoveTargetForSelectedItems(const Sender& sender);
-    /// Asks where items of a folder shall go, or, when there is no other folder, for the name of a new one.
+    /// Asks for the destination of a folder's items or, when there is no other folder, for the name of a new
+    /// one.
     void showMoveTargetForItemsInFolder(
         const std::vector<platform::Url>& items, const std::optional<platform::Url>& folder);
     void documentTargetSelectionControllerDidSelectItemAtURL(
-        const std::shared_ptr<screens::MoveTargetPicker>& picker,
-        const platform::Url& folder) override;
-    /// Shows what can be done with an item outside the drive, at a view or, without one, at the browser's.
-    void showDICUrlCompletion(const std::shared_ptr<kit::View>& view, const platform::Url& url,
-        const Completion& completion);
+        const std::shared_ptr<screens::MoveTargetPicker>& picker, const platform::Url& folder) override;
+    /// Shows the share sheet of an item at a view or, without a view, at the browser's own.
+    void showDICUrlCompletion(
+        const std::shared_ptr<kit::View>& view, const platform::Url& url, const Completion& completion);
     /// Asks for an item's new name.
     void showRenamePrompt(const platform::Url& url);
-    /// Moves items into a folder, one after the other; answers the errors of those that stayed.
+    /// Moves items into a folder one after the other, and answers the errors of those that could not be
+    /// moved.
     std::vector<platform::Error> moveItemsToDirectoryToDirectory(
         const std::vector<platform::Url>& items, const platform::Url& directory);
-    /// The same, and tells the user what stayed.
+    /// Moves items into a folder like the operation above, and shows the user which could not be moved.
     void moveItemsToDirectoryAndShowErrorsToDirectory(
         const std::vector<platform::Url>& items, const platform::Url& directory);
     /// Asks before the selected items of the list on top are deleted.
     void showWarningAndDeleteDocument(const Sender& sender);
-    /// Asks before items (documents and folders, or app libraries) are deleted, at a view or at the toolbar's
-    /// button. The finisher (may be empty) is called once, after the answer or a refusal.
+    /// Asks before items (documents and folders, or app libraries) are deleted; the sheet points at a view or
+    /// at the toolbar's button. The finisher (may be empty) is called once, after the answer or a refusal.
     void showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(
-        const std::vector<platform::Url>& urls, const std::shared_ptr<kit::View>& view,
-        const List& list, const Completion& finished);
+        const std::vector<platform::Url>& urls, const std::shared_ptr<kit::View>& view, const List& list,
+        const Completion& finished);
 
 private:
     std::shared_ptr<NavController> self();
@@ -225,16 +216,15 @@ private:
     void showVanishedItem(const platform::Url& url);
     void openFolder(const platform::Url& url, const platform::Operation& op);
     void openDocument(const std::shared_ptr<DRItem>& item, const platform::Operation& op);
-    void performDelete(const platform::Url& url, const std::shared_ptr<kit::View>& view,
-        const Completion& completion);
+    void performDelete(
+        const platform::Url& url, const std::shared_ptr<kit::View>& view, const Completion& completion);
     void performInfo(const platform::Url& url);
     void deleteConfirmed(const std::vector<platform::Url>& urls, const Completion& finished);
 
     Sender makeToolbarButton(const std::string& title, void (NavController::*operation)(const Sender&));
     void configureEditToolbar(const List& list);
 
-    std::shared_ptr<kit::BarButtonItem> _barButtonNewFolder, _barButtonMoveItem,
-        _barButtonDeleteItem;
+    std::shared_ptr<kit::BarButtonItem> _barButtonNewFolder, _barButtonMoveItem, _barButtonDeleteItem;
     std::shared_ptr<screens::DocumentInteractionSheet> _documentInteractionController;
     bool _editMode = false;
     bool _pickerIsAlive = false;

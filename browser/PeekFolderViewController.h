@@ -14,7 +14,7 @@ public:
 
     using DocumentListController::DocumentListController;
 
-    /// Actions that the peek itself would offer; the program sets none.
+    /// The actions that the peek itself would offer. The program sets none.
     const kit::Menu& previewActionItems() const { return _previewActionItems; }
     void setPreviewActionItems(kit::Menu items) { _previewActionItems = std::move(items); }
 
