@@ -19,10 +19,10 @@
 
 namespace tarrow {
 
+using kit::Window;
 using platform::Application;
 using platform::ShortcutItem;
 using platform::UserActivity;
-using kit::Window;
 
 namespace {
 
@@ -33,7 +33,7 @@ std::optional<std::string> textAt(const PropertyDictionary& information, std::st
     return text ? std::optional(*text) : std::nullopt;
 }
 
-/// The URL whose archive lies under a key.
+/// Answers the URL whose archive is stored under a key.
 std::optional<Url> archivedURL(const PropertyDictionary& information, std::string_view key)
 {
     const auto* value = platform::find(information, key);
@@ -54,8 +54,8 @@ std::optional<Url> documentWithNumber(const PropertyValue& number)
     return identifier ? trw_URLFromDocumentID(std::to_string(*identifier)) : std::nullopt;
 }
 
-/// The location that a shortcut to a recent document means. An identifier is final even when it leads
-/// nowhere: the plain location may long belong to another document.
+/// Answers the location that a shortcut to a recent document means. An identifier decides even when it leads
+/// nowhere, because another document may long have taken the plain location.
 std::optional<Url> recentDocument(const PropertyDictionary& information)
 {
     if (auto alias = archivedURL(information, platform::RecentDocumentAliasURLKey))
@@ -237,7 +237,7 @@ void AppDelegate::openHandedOverDocument(const UserActivity& activity)
             if (weak.expired())
                 return;
             op.info("Batonne document URL: %@", *result.value);
-            // Locked only on the main queue, so that the delegate never ends on this thread.
+            // The delegate is locked only on the main queue, so that it is never destroyed on this thread.
             services().dispatch().mainQueue()->async([weak, url = *result.value] {
                 if (const auto self = weak.lock())
                     self->warpTo(url, PreviewModeQuick);

@@ -17,11 +17,11 @@ namespace tarrow {
 
 class NavController;
 
-/// Makes the one window with the browser, and leads everything that enters the application from outside to
-/// it. Made with std::make_shared. Main thread only.
+/// Creates the application's one window with the browser, and passes to the browser everything that enters
+/// the application from outside. Made with std::make_shared. Main thread only.
 class AppDelegate : public platform::ApplicationDelegate, public std::enable_shared_from_this<AppDelegate> {
 public:
-    /// Null before the launch.
+    /// Answers null before the launch.
     const std::shared_ptr<kit::Window>& rootWindow() const { return _rootWindow; }
     void setRootWindow(std::shared_ptr<kit::Window> window) { _rootWindow = std::move(window); }
 
@@ -30,29 +30,29 @@ public:
     bool applicationDidFinishLaunchingWithOptions(
         platform::Application& application, const platform::LaunchOptions& options) override;
     void applicationWillResignActive(platform::Application& application) override;
-    /// State is kept and restored only while somebody is signed in.
+    /// The state is kept and restored only while somebody is signed in.
     bool applicationShouldSaveApplicationState(
         platform::Application& application, platform::StateCoder& coder) override;
     bool applicationShouldRestoreApplicationState(
         platform::Application& application, platform::StateCoder& coder) override;
     bool applicationOpenURLOptions(platform::Application& application, const std::string& url,
         const platform::PropertyDictionary& options) override;
-    /// The completion is not called.
+    /// The completion is never called.
     void applicationPerformActionForShortcutItemCompletionHandler(platform::Application& application,
         const platform::ShortcutItem& shortcut, const ShortcutCompletion& completion) override;
     bool applicationWillContinueUserActivityWithType(
         platform::Application& application, const std::string& type) override;
-    /// The handler is not called.
+    /// The handler is never called.
     bool applicationContinueUserActivityRestorationHandler(platform::Application& application,
         const platform::UserActivity& activity, const RestorationHandler& handler) override;
     void applicationDidFailToContinueUserActivityWithTypeError(
         platform::Application& application, const std::string& type, const platform::Error& error) override;
 
 private:
-    /// The window's root when it is the browser; else null, and nothing is led anywhere.
+    /// Answers the window's root when it is the browser, else null; nothing is shown then.
     std::shared_ptr<NavController> browser() const;
     bool isSignedIn() const;
-    /// A hook for diagnosis while the application goes to the back; it does nothing.
+    /// Is called for diagnosis when the application goes to the background; it does nothing.
     void dumpWindowInfo() const;
     bool warpTo(const std::optional<platform::Url>& url, int previewMode);
     void warpLater(const platform::Url& url);
@@ -64,7 +64,7 @@ private:
     std::shared_ptr<kit::Window> _rootWindow;
 };
 
-/// Logs one line at each level. For diagnosis; nothing calls it.
+/// Logs one line at each level. It serves diagnosis; nothing calls it.
 void _TarrowDriveLogTest(); // NOLINT(bugprone-reserved-identifier): called by this name from a debugger
 
 } // namespace tarrow

@@ -13,7 +13,7 @@ namespace {
 
 std::optional<Url> targetOf(const Url& url)
 {
-    // The URL has undone the first encoding already.
+    // Parsing the URL has already undone the outer encoding.
     const auto path = platform::percentDecoded(url.path());
     if (!path || !path->starts_with('/'))
         return std::nullopt;

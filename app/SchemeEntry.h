@@ -10,16 +10,17 @@
 
 namespace tarrow {
 
-/// What a URL of the application's own scheme asks for.
+/// The request in a URL of the application's own scheme.
 struct SchemeEntry {
-    /// The item to show; nothing when the URL names none.
+    /// The item to show; absent when the URL names none.
     std::optional<platform::Url> target;
     int previewMode;
 
-    /// Nothing for a text that is no URL and for any other scheme; letter case counts. The URL's path is an
-    /// absolute file path; the last "mode" item of the query decides how it is previewed.
+    /// Answers nothing for a text that is not a URL and for any other scheme; letter case counts. The URL's
+    /// path is an absolute file path. The last "mode" item of the query decides how the item is previewed.
     ///
-    /// Path and query are percent-decoded twice: whoever makes these URLs encodes the path, and then the URL.
+    /// Path and query are percent-decoded twice, because the makers of these URLs encode first the path and
+    /// then the URL.
     static std::optional<SchemeEntry> parse(std::string_view text);
 };
 

@@ -43,7 +43,7 @@ using host::drive::LocalCloudDocumentService;
 using host::system::UserLocale;
 using platform::ServiceSet;
 
-/// The program's own file, also when it was started by its bare name.
+/// Answers the program's own file, also when it was started by its bare name.
 std::string executablePath(const char* firstArgument)
 {
     std::error_code problem;
@@ -51,7 +51,7 @@ std::string executablePath(const char* firstArgument)
     return problem ? std::string(firstArgument ? firstArgument : "") : path.string();
 }
 
-/// The catalogues beside the program in the build tree, else where they are installed.
+/// Answers the folder of the catalogues: beside the program in the build tree, else where they are installed.
 std::string localeFolder(const std::filesystem::path& executable)
 {
     const auto built = executable.parent_path() / "po" / "locale";
@@ -60,10 +60,11 @@ std::string localeFolder(const std::filesystem::path& executable)
                                                    : executable.parent_path().parent_path() / "share/locale";
 }
 
-/// Named after the version: the module of another one uses other classes than this program has.
+/// The module's name holds the version, because a module of another version has other classes than this
+/// program.
 constexpr auto moduleName = "previews-" TRW_VERSION ".so";
 
-/// The module of the previews, in the build tree, else where it is installed.
+/// Answers the file of the preview module: in the build tree, else where it is installed.
 std::string previewModule(const std::filesystem::path& executable)
 {
     const auto built = executable.parent_path() / "modules" / moduleName;
@@ -73,7 +74,7 @@ std::string previewModule(const std::filesystem::path& executable)
         : executable.parent_path().parent_path() / TRW_MODULE_FOLDER / moduleName;
 }
 
-/// What needs nothing of the drive.
+/// Answers the services that need nothing of the drive.
 ServiceSet systemServices(const std::string& executable, const UserLocale& locale,
     const std::shared_ptr<host::gtk::PreviewModule>& previews)
 {
@@ -100,7 +101,7 @@ ServiceSet systemServices(const std::string& executable, const UserLocale& local
     return set;
 }
 
-/// Adds what stands on the drive's folder; answers where the drive lies.
+/// Adds the services that work on the drive's folder, and answers the drive's layout.
 DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale)
 {
     const host::drive::DriveDependencies dependencies{
@@ -132,12 +133,14 @@ int main(int argc, char** argv)
     op.info("Running %s", executable);
     op.info("Built (main) on " __DATE__ " @ " __TIME__);
 
-    // Read once: the message catalogues' set-up changes the variables that it comes from.
+    // The locale is read once, because setting up the message catalogues changes the environment variables
+    // that it is read from.
     const auto locale = UserLocale::fromEnvironment();
     const auto previews = host::gtk::PreviewModule::inFile(previewModule(executable));
     auto set = systemServices(executable, locale, previews);
     const auto layout = addDriveServices(set, locale);
-    // The queues end last: everything else may still hand them work while it ends.
+    // The queues are destroyed last, because other services may still post work to them while they are
+    // destroyed.
     const auto dispatch = set.dispatch;
     platform::installServices(std::move(set));
     tarrow::FileUtils::logFileAttributes(executable);

@@ -19,8 +19,8 @@
 #include <string_view>
 #include <vector>
 
-/// The file operations of the program from a command line, for trying faults on them one call at a time
-/// (kills, full disks, other writers). Paths are below the drive's top level.
+/// This program runs the application's file operations from a command line, so that faults (kills, full
+/// disks, other writers) can be tried on them one call at a time. Paths are below the drive's top level.
 
 namespace {
 
@@ -59,7 +59,7 @@ int printIdentifier(const Url& url)
     return report(identifier.error);
 }
 
-/// Takes an identifier, not a path.
+/// Prints the location of a document identifier.
 int printLocation(const std::string& identifier)
 {
     const auto url = tarrow::trw_URLFromDocumentID(identifier);
@@ -83,7 +83,7 @@ const char* kindName(platform::FileType type)
     return "other";
 }
 
-/// Brings a document here from the cloud, and waits for it.
+/// Downloads a document from the cloud and waits for the end.
 int fetch(const Url& url, host::system::GLibDispatch& dispatch)
 {
     std::optional<std::optional<platform::Error>> ended;
@@ -93,7 +93,7 @@ int fetch(const Url& url, host::system::GLibDispatch& dispatch)
     return report(*ended);
 }
 
-/// Saves the content of one document in the place of another's.
+/// Replaces the content of one document by that of another.
 int save(const Url& url, const Url& from)
 {
     constexpr std::size_t mostBytes = 64UL * 1024 * 1024;
@@ -105,8 +105,8 @@ int save(const Url& url, const Url& from)
     return report(files.replaceContent(url.path(), *before, *content->bytes).error);
 }
 
-/// Prints what a user sees below a folder, sorted by path: the kind, a tab, the path. A document that hides a
-/// promise is listed once.
+/// Prints the items that a user sees below a folder, sorted by path: the kind, a tab, the path. A document
+/// beside its own promise is listed once.
 int list(const Url& folder)
 {
     using Continue = platform::FileSystem::Continue;
@@ -132,7 +132,7 @@ int list(const Url& folder)
     return report(failed);
 }
 
-/// The exit status; 2 for what is no command.
+/// Answers the exit status, which is 2 for an unknown command.
 int run(std::string_view command, const std::vector<Url>& urls, host::system::GLibDispatch& dispatch)
 {
     if (command == "mkdir" && urls.size() == 1)
@@ -160,7 +160,8 @@ int main(int argc, char** argv)
 {
     host::system::installSystemLog();
     const std::vector<std::string> arguments(argv, argv + argc);
-    // The queues end last: the services may still hand them work while they end.
+    // The queues are destroyed last, because the services may still post work to them while they are
+    // destroyed.
     const auto dispatch = std::make_shared<host::system::GLibDispatch>();
     const auto top = installDrive(dispatch)->layout().defaultContainer();
     std::vector<Url> urls;
@@ -169,7 +170,7 @@ int main(int argc, char** argv)
     if (arguments.size() == 2 && arguments[1] == "list")
         urls.push_back(Url::fileURL(top));
     const bool resolves = arguments.size() == 3 && arguments[1] == "resolve";
-    // The main thread would look only as long as nobody notices.
+    // The look-up runs on another thread, because on the main thread the service limits its time.
     const int status = resolves ? std::async(std::launch::async, printLocation, arguments[2]).get()
         : arguments.size() > 1  ? run(arguments[1], urls, *dispatch)
                                 : 2;
