@@ -24,7 +24,7 @@ constexpr int startAttempts = 250;
 constexpr gulong attemptPause = 20'000; ///< microseconds
 constexpr int displays = 100;
 
-/// A socket for the loopback address; closed with the object.
+/// A socket on the loopback address, which is closed with the object.
 class LoopbackSocket {
 public:
     LoopbackSocket()
@@ -65,7 +65,7 @@ std::string socketPath(int display)
     return std::string(g_get_user_runtime_dir()) + "/broadway" + std::to_string(display + 1) + ".socket";
 }
 
-/// A display number whose socket does not exist.
+/// Answers a display number whose socket does not exist.
 std::optional<int> freeDisplay()
 {
     for (int display = 0; display < displays; ++display) {

@@ -8,18 +8,18 @@
 
 namespace host::gtk {
 
-/// A server of GTK's own that shows the program's window in a web browser, for machines without a display. It
-/// listens on the loopback address only, and ends with this object and with the process.
+/// A process of GTK's own server that shows the program's window in a web browser, for machines without a
+/// display. It listens on the loopback address only, and ends with this object and with this process.
 class BroadwayServer {
 public:
-    /// Starts one on a free port and points the toolkit's environment to it. Null: it is not installed, or
-    /// did not start within five seconds.
+    /// Starts a server on a free port and points the toolkit's environment variables to it. Answers null when
+    /// it is not installed or did not start within five seconds.
     static std::unique_ptr<BroadwayServer> start();
     ~BroadwayServer();
     BroadwayServer(const BroadwayServer&) = delete;
     BroadwayServer& operator=(const BroadwayServer&) = delete;
 
-    const std::string& address() const { return _address; } ///< for a web browser
+    const std::string& address() const { return _address; } ///< the address to open in a web browser
 
 private:
     struct Process;

@@ -10,13 +10,13 @@
 
 namespace host::gtk {
 
-/// What a start of the program asks for.
+/// The request that a start of the program makes.
 struct OpenUrl {
-    std::string url; ///< as it was written, nothing decoded
+    std::string url; ///< as it was written, without decoding
     bool operator==(const OpenUrl&) const = default;
 };
 struct OpenSearch {
-    std::optional<std::string> query; ///< nothing: the search shortcut
+    std::optional<std::string> query; ///< absent: the search shortcut
     bool operator==(const OpenSearch&) const = default;
 };
 using LaunchRequest = std::variant<OpenUrl, OpenSearch>;
@@ -27,10 +27,10 @@ struct CommandLine {
 
     Mode mode = Mode::Run;
     std::vector<LaunchRequest> requests;
-    std::string complaint; ///< for Invalid: what is wrong, in the user's language
+    std::string complaint; ///< of Invalid: the error, in the user's language
 
     static CommandLine parse(int argc, const char* const* argv);
-    /// The text of --help, in the user's language.
+    /// Answers the text of --help in the user's language.
     static std::string helpText();
 };
 

@@ -27,11 +27,11 @@ namespace {
 using Completion = platform::DocumentSharing::Completion;
 using OwnedError = std::unique_ptr<GError, decltype(&g_error_free)>;
 
-/// One call to another program: what to say when it fails, and whom to tell.
+/// One call to another program: the message for a failure, and the completion.
 struct Call {
     std::string words;
     Completion completion;
-    std::string folder{}; ///< of the item for the file manager
+    std::string folder{}; ///< the item's folder, for the file manager
 };
 
 Error failureOf(const Call& call, const GError* error)
@@ -74,7 +74,7 @@ void itemWasShown(GObject* bus, GAsyncResult* result, gpointer data)
         end(*call, nullptr);
         return;
     }
-    // No file manager answers on the bus: at least the folder can be opened.
+    // No file manager answers on the bus, so at least the folder is opened.
     const auto folder = call->folder;
     g_app_info_launch_default_for_uri_async(
         folder.c_str(), nullptr, nullptr, folderWasOpened, call.release());

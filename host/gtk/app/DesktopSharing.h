@@ -18,9 +18,9 @@ namespace host::gtk {
 class PreviewModule;
 enum class PrintableKind : int;
 
-/// The desktop's ways to hand on a document: its clipboard, the mail program of "mailto" through xdg-email,
-/// the file manager that answers org.freedesktop.FileManager1 (else the one that opens folders), and its
-/// print dialog.
+/// Shares a document through the desktop: its clipboard, the mail program of "mailto" through xdg-email, the
+/// file manager that answers org.freedesktop.FileManager1 (else the one that opens folders), and its print
+/// dialog.
 class DesktopSharing : public platform::DocumentSharing {
 public:
     DesktopSharing(

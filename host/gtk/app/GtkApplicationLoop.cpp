@@ -39,7 +39,7 @@ constexpr const char* maximized = "maximized";
 constexpr const char* window = "window";
 } // namespace StateKey
 
-/// Bounds for a window size that was stored: nothing that a damaged file says makes the window unusable.
+/// A stored window size is limited to this, so that a damaged file cannot make the window unusable.
 constexpr std::int64_t largestSide = 16384;
 
 PropertyDictionary dictionaryAt(const PropertyDictionary& values, std::string_view key)
@@ -72,7 +72,7 @@ PropertyDictionary dictionaryOf(const WindowSize& size)
         {StateKey::maximized, size.isMaximized}};
 }
 
-/// The kinds of values that an activity may carry over the bus.
+/// Answers the value for each type that an activity may carry over the bus.
 platform::PropertyValue valueOf(GVariant* variant)
 {
     if (g_variant_is_of_type(variant, G_VARIANT_TYPE_STRING))
@@ -194,7 +194,7 @@ int GtkApplicationLoop::runPrimary(char** argv, const CommandLine& line)
     connectApplication();
     auto* application = G_APPLICATION(_application.get());
     g_application_register(application, nullptr, nullptr);
-    // Another process may have taken the name since it was asked for.
+    // Another process may have taken the name since this one asked for it.
     if (g_application_get_is_remote(application))
         return RemoteInstance(_settings.applicationId).forward(line.requests) ? EX_OK : EX_UNAVAILABLE;
     _waiting = line.requests;
@@ -212,7 +212,7 @@ bool GtkApplicationLoop::openDisplay()
     _broadway = BroadwayServer::start();
     if (!_broadway)
         return false;
-    // Initialised without success above, the toolkit does not open a display by itself again.
+    // After the initialisation failed above, the toolkit does not open a display by itself.
     if (!gtk_init_check() || (!gdk_display_get_default() && !gdk_display_open(nullptr)))
         return false;
     std::cout << platform::localized("Open %@ in a web browser on this machine.", {_broadway->address()})
@@ -267,8 +267,8 @@ void GtkApplicationLoop::addActions()
         [this](GVariant* activity) { continueActivity(activityOf(activity)); });
 }
 
-/// The delegate builds the window, the state comes back, the launch ends; then what the command line asked
-/// for.
+/// Lets the delegate build the window, restores the state and ends the launch. Then it carries out the
+/// requests of the command line.
 void GtkApplicationLoop::launch(std::optional<ShortcutItem> shortcut)
 {
     auto waiting = std::exchange(_waiting, {});
@@ -280,7 +280,7 @@ void GtkApplicationLoop::launch(std::optional<ShortcutItem> shortcut)
         platform::services().localization().isRightToLeft() ? GTK_TEXT_DIR_RTL : GTK_TEXT_DIR_LTR);
     auto size = storedSize(_stateFile);
     if (_broadway) {
-        // A browser's page is the whole screen of its window: nothing would bring it back from an icon.
+        // In a browser the page is the whole screen, so a minimised window could not be brought back.
         size.isMaximized = true;
         g_object_set(gtk_settings_get_default(), "gtk-decoration-layout", ":", nullptr);
     }
@@ -408,13 +408,12 @@ void GtkApplicationLoop::saveState()
     _stateFile.set(StateKey::window, dictionaryOf(window->currentSize()));
     platform::StateCoder coder;
     const auto root = model->rootViewController();
-    // State of an account that has gone must not come back for the next one.
+    // The state of an account must not be restored for the next account.
     const bool allowed = root && _delegate->applicationShouldSaveApplicationState(*this, coder);
     _stateFile.set(
         StateKey::application, allowed ? platform::PropertyValue(coder.values()) : platform::PropertyValue());
     _stateFile.set(StateKey::interface,
-        allowed ? platform::PropertyValue(kit::encodeInterfaceState(*root))
-                : platform::PropertyValue());
+        allowed ? platform::PropertyValue(kit::encodeInterfaceState(*root)) : platform::PropertyValue());
 }
 
 } // namespace host::gtk

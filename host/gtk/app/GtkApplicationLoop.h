@@ -19,18 +19,18 @@ namespace host::gtk {
 class BroadwayServer;
 class HandOverToasts;
 
-/// The application's loop on the main thread: one process with one window; later starts hand over to it.
-/// Without a display the window is served to a web browser on this machine.
+/// The application's loop on the main thread: one process with one window. Later starts pass their requests
+/// to it. Without a display the window is served to a web browser on this machine.
 class GtkApplicationLoop : public platform::Application {
 public:
     explicit GtkApplicationLoop(ApplicationSettings settings);
     ~GtkApplicationLoop() override;
 
-    /// The exit status is 0 after the window was closed, 64 for arguments that are not understood, 69 where
-    /// there is no way to show a window.
+    /// Answers the exit status: 0 after the window was closed, 64 for arguments that are not understood, 69
+    /// when no window can be shown.
     int run(int argc, char** argv, const DelegateFactory& makeDelegate) override;
 
-    /// The window that is shown; null: none.
+    /// Answers the window that is shown, or null.
     WindowPeer* windowPeer() const;
 
 private:
@@ -58,7 +58,7 @@ private:
     std::shared_ptr<HandOverToasts> _handOver;
     DelegateFactory _makeDelegate;
     std::shared_ptr<platform::ApplicationDelegate> _delegate; ///< null before the launch
-    std::vector<LaunchRequest> _waiting; ///< of the command line, until the launch
+    std::vector<LaunchRequest> _waiting; ///< requests of the command line that wait for the launch
     bool _active = false;
     SignalConnections _connections;
 };

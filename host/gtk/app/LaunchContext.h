@@ -9,8 +9,8 @@ typedef struct _GAppLaunchContext GAppLaunchContext;
 
 namespace host::gtk {
 
-/// What an app that is started now needs to bring its window to the front: the display, and a token that says
-/// that the person asked for it. Null without a display. Main thread.
+/// Answers the context with which an app can bring its window to the front: the display, and a token for the
+/// user's request. Answers null without a display. Main thread.
 std::shared_ptr<GAppLaunchContext> makeLaunchContext();
 
 } // namespace host::gtk

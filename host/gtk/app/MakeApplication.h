@@ -18,11 +18,12 @@ struct ApplicationSettings {
     std::string version;
     std::string stateFile; ///< path of the file that keeps the interface's state
     std::shared_ptr<PreviewModule> previews;
-    /// Called once, when the first list is on the screen and nothing else is to be done: for what can wait.
+    /// Called once, when the first list is on the screen and the main loop is idle, to begin work that can
+    /// wait.
     std::function<void()> onFirstList;
 };
 
-/// The application's loop on GTK (see GtkApplicationLoop), behind the platform's interface.
+/// Makes the application's loop on GTK (see GtkApplicationLoop), behind the platform's interface.
 std::unique_ptr<platform::Application> makeApplication(ApplicationSettings settings);
 
 } // namespace host::gtk

@@ -29,7 +29,7 @@ bool hasOwner(GDBusConnection* bus, const std::string& name)
     return owned;
 }
 
-/// What the launcher hands on so that the window may come to the front.
+/// Answers the launcher's data, with which the window may come to the front.
 GVariant* platformData()
 {
     GVariantBuilder builder;
@@ -52,7 +52,7 @@ GVariant* queryActivity(const std::string& query)
     return g_variant_builder_end(&builder);
 }
 
-/// The arguments of ActivateAction: the action, its parameter if any, platform data.
+/// Answers the arguments of ActivateAction: the action, its parameter if any, and the platform data.
 GVariant* actionCall(const LaunchRequest& request)
 {
     GVariantBuilder parameters;

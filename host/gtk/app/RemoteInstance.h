@@ -9,13 +9,13 @@
 
 namespace host::gtk {
 
-/// The process of the application that runs already, reached over the session bus. Needs no display.
+/// The running process of the application, reached over the session bus. It needs no display.
 class RemoteInstance {
 public:
     explicit RemoteInstance(std::string applicationId);
 
-    /// Hands the requests to the running process, or brings its window to the front when there are none.
-    /// False: there is no such process.
+    /// Passes the requests to the running process, or brings its window to the front when there are none.
+    /// Answers false when there is no such process.
     bool forward(const std::vector<LaunchRequest>& requests) const;
 
 private:

@@ -62,7 +62,7 @@ void StateFile::set(const std::string& key, platform::PropertyValue value)
 void StateFile::write() const
 {
     static constexpr platform::Operation op{"-[StateFile write]"};
-    std::error_code ignored; // the write itself says what is wrong with the folder
+    std::error_code ignored; // the write below reports what is wrong with the folder
     std::filesystem::create_directories(std::filesystem::path(_path).parent_path(), ignored);
     const auto error = system::writeFileAtomically(_path, text(system::JsonKeyedArchiver().archive(_values)));
     if (error)

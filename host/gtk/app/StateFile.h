@@ -9,17 +9,17 @@
 
 namespace host::gtk {
 
-/// What the interface keeps from run to run: the window's size, and the state of its screens. Main thread
-/// only.
+/// The state of the interface that is kept from run to run: the window's size and the state of its screens.
+/// Main thread only.
 class StateFile {
 public:
-    /// The folder of the path is made when it is missing.
+    /// Reads the file. The folder of the path is made when it is missing.
     explicit StateFile(std::string path);
 
-    /// As it was stored last; empty when nothing was, or what is there is damaged.
+    /// Answers the values that were stored last, or none when the file is missing or damaged.
     const platform::PropertyDictionary& values() const { return _values; }
-    /// Stores a value under a key, without the key when it is null. The file changes in one step; it is left
-    /// alone when it would not change.
+    /// Stores a value under a key; null removes the key. The file is replaced atomically, and not written
+    /// when nothing changes.
     void set(const std::string& key, platform::PropertyValue value);
 
 private:

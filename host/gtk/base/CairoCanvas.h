@@ -10,7 +10,7 @@
 
 namespace host::gtk {
 
-/// What a view draws into while its widget is painted.
+/// The canvas into which a view draws while its widget is painted.
 class CairoCanvas : public kit::Canvas {
 public:
     CairoCanvas(cairo_t* cairo, const Theme& theme);

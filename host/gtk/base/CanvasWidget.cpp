@@ -48,7 +48,7 @@ void allocate(GtkWidget* widget, int width, int height, int /*baseline*/)
 {
     if (auto* client = canvasOf(widget)->client)
         client->canvasAllocate(width, height);
-    // A popover stands in its own surface and follows what it points at only when it is told.
+    // A popover has a surface of its own and follows its anchor only when it is presented again.
     for (auto* child = gtk_widget_get_first_child(widget); child;
          child = gtk_widget_get_next_sibling(child)) {
         if (GTK_IS_POPOVER(child))
@@ -124,7 +124,7 @@ void allocateChild(GtkWidget* child, const platform::Rect& frame)
     const double x = std::round(frame.x), y = std::round(frame.y);
     int minimumWidth = 0, minimumHeight = 0;
     gtk_widget_measure(child, GTK_ORIENTATION_HORIZONTAL, -1, &minimumWidth, nullptr, nullptr, nullptr);
-    // A width such as 83.999 comes from the solver's arithmetic and must not cost a text its last letter.
+    // A width such as 83.999 comes from the solver's arithmetic, and must not cost a text its last letter.
     const int width = std::max(static_cast<int>(std::ceil(std::max(0.0, frame.width) - 0.01)), minimumWidth);
     gtk_widget_measure(child, GTK_ORIENTATION_VERTICAL, width, &minimumHeight, nullptr, nullptr, nullptr);
     const int height =

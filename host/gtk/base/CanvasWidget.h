@@ -9,33 +9,33 @@
 
 namespace host::gtk {
 
-/// What a canvas widget asks. Called on the main thread while the widget has this client.
+/// Answers the questions of a canvas widget. Called on the main thread while the widget has this client.
 class CanvasClient {
 public:
     virtual ~CanvasClient() = default;
-    /// The size that the widget asks its parent for, in points, when it may be `forWidth` wide (negative:
-    /// any).
+    /// Answers the size that the widget asks of its parent, in points, when it may be `forWidth` wide
+    /// (negative: any width).
     virtual platform::Size canvasNaturalSize(double forWidth) = 0;
-    /// The widget has this size now: allocate its children.
+    /// The widget now has this size, and the client allocates its children.
     virtual void canvasAllocate(int width, int height) = 0;
-    /// Paint, with the children.
+    /// Paints the widget and its children.
     virtual void canvasSnapshot(GtkSnapshot* snapshot) = 0;
-    /// Whether a point belongs to the widget. The default of a canvas is its rectangle.
+    /// Answers whether a point belongs to the widget. A canvas without a client answers by its rectangle.
     virtual bool canvasContains(double x, double y) = 0;
 };
 
-/// A container that leaves the places of its children to its client. Without one it is empty space. It
+/// A container that leaves the places of its children to its client. Without a client it is empty space. It
 /// unparents its children when it is disposed of.
 namespace CanvasWidget {
 
 GType type();
 GtkWidget* make(GtkAccessibleRole role);
-/// The client is not owned: take it away before it ends.
+/// Sets the client, which is not owned. The owner removes the client (null) before destroying it.
 void setClient(GtkWidget* canvas, CanvasClient* client);
-/// Puts a child behind `previous`, at the very back when that is null.
+/// Puts a child behind `previous`, or at the very back when that is null.
 void insertAfter(GtkWidget* canvas, GtkWidget* child, GtkWidget* previous);
 
-/// Allocates a child at a rectangle on whole points, never below its minimum size.
+/// Allocates a child at a rectangle on whole points, at least as large as the child's minimum size.
 void allocateChild(GtkWidget* child, const platform::Rect& frame);
 void snapshotChildren(GtkWidget* canvas, GtkSnapshot* snapshot);
 

@@ -13,7 +13,7 @@ namespace {
 
 constexpr char timeOfDismissal[] = "trw-time-of-dismissal";
 
-/// Milliseconds of the clock that events have their times of.
+/// Answers the time in milliseconds, by the clock that events use.
 std::uint32_t now()
 {
     return static_cast<std::uint32_t>(g_get_monotonic_time() / 1000);

@@ -7,8 +7,8 @@
 
 namespace host::gtk {
 
-/// A finger that puts a popover away means nothing else. Under X the same touch comes to the window too, once
-/// the popover has let go of the screen; it is kept from the window then. To be called once for each popover.
+/// A touch that closes a popover must do nothing else. Under X the same touch also reaches the window once
+/// the popover has released its grab; this keeps it from the window. Call it once for each popover.
 void keepDismissingTouchFromWindow(GtkWidget* popover);
 
 } // namespace host::gtk

@@ -11,8 +11,8 @@
 
 namespace host::gtk {
 
-/// Notes when the first list with rows is on the screen: the end of the start, which the start's benchmark
-/// waits for. Main thread only.
+/// Notes when the first list with rows is on the screen. That is the end of the start, for which the start's
+/// benchmark waits. Main thread only.
 class FirstList {
 public:
     FirstList() = default;
@@ -20,9 +20,9 @@ public:
     FirstList(const FirstList&) = delete;
     FirstList& operator=(const FirstList&) = delete;
 
-    /// A list has rows. At the first call its next frame is awaited and logged; further calls are cheap.
+    /// A list has rows. The first call waits for the list's next frame and logs it; further calls are cheap.
     void note(GtkWidget* list);
-    /// Called once, after that frame, when the main loop has nothing else to do.
+    /// The callback runs once, after that frame, when the main loop is idle.
     void setOnShown(std::function<void()> callback) { _onShown = std::move(callback); }
 
 private:

@@ -47,7 +47,7 @@ void FrameScheduler::flush()
     for (int round = 0; round < maximumRounds && !_pending.empty(); ++round) {
         const auto owners = std::exchange(_order, {});
         for (const void* owner : owners) {
-            // Taken out one by one: work that runs may cancel what comes after it.
+            // Each one is taken out before it runs, because its work may cancel later ones.
             const auto found = _pending.extract(owner);
             if (!found.empty())
                 found.mapped()();

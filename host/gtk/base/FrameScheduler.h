@@ -15,28 +15,30 @@
 
 namespace host::gtk {
 
-/// Gathers what has to be shown and shows it once a frame, before the window lays itself out. While the
-/// window has no frame clock yet, work waits for it. Main thread only.
+/// Gathers changes and shows them once a frame, before the window's layout. Until the window has a frame
+/// clock, the work waits. Main thread only.
 class FrameScheduler : public std::enable_shared_from_this<FrameScheduler> {
 public:
     using Work = std::function<void()>;
 
     ~FrameScheduler();
 
-    /// Runs `work` in the next frame; a later request for the same owner replaces the earlier one. An owner
-    /// that ends before takes its work back with `cancel`.
+    /// Runs `work` in the next frame. A later request of the same owner replaces the earlier one. An owner
+    /// cancels its work before it is destroyed.
     void schedule(const void* owner, Work work);
     void cancel(const void* owner);
-    /// Runs `work` in a frame of its own: when it is called inside of a frame, in the one after.
+    /// Runs `work` in the next frame that begins; when this is called inside a frame, in the one after.
     void scheduleNextFrame(const void* owner, Work work);
-    /// Runs what waits now. What is scheduled meanwhile runs as well, up to a limit that ends endless chains.
+    /// Runs the waiting work now. Work that is scheduled meanwhile runs as well, up to a limit that ends
+    /// endless chains.
     void flush();
     bool isIdle() const { return _pending.empty() && _later.empty(); }
 
-    /// The window's frames drive the work from now on.
+    /// From now on the window's frame clock drives the work.
     void attach(GtkWidget* window);
 
-    /// Keeps an object until the main loop is idle: peers end there, never inside one of their own callbacks.
+    /// Keeps an object alive until the main loop is idle, so that a peer is never destroyed inside one of its
+    /// own callbacks.
     void release(std::shared_ptr<void> object);
 
 private:

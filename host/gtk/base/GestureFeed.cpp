@@ -10,8 +10,8 @@
 
 namespace host::gtk {
 
-using platform::Point;
 using kit::GestureRecognizer;
+using platform::Point;
 
 namespace {
 
@@ -47,7 +47,7 @@ GestureFeed::GestureFeed(GtkWidget* widget, std::weak_ptr<kit::View> view)
     }));
     _connections.push_back(connectSignal<void(GdkEventSequence*)>(_drag, "cancel",
         [this](GdkEventSequence*) { tell([](GestureRecognizer& recognizer) { recognizer.cancelled(); }); }));
-    // A finger that rests sends no events: a report without movement lets the recognisers look at the time.
+    // A finger that rests sends no events. A report without movement lets the recognisers look at the time.
     _connections.push_back(connectSignal<void(double, double)>(_rest, "pressed", [this](double, double) {
         tell([this](GestureRecognizer& recognizer) { recognizer.moved(_last, now()); });
     }));

@@ -18,7 +18,7 @@ class View;
 
 namespace host::gtk {
 
-/// Hands what one finger or the first mouse button does on a widget to the recognisers of a view.
+/// Reports what one finger or the first mouse button does on a widget to the recognisers of a view.
 class GestureFeed {
 public:
     GestureFeed(GtkWidget* widget, std::weak_ptr<kit::View> view);

@@ -24,7 +24,7 @@ ObjectRef<GtkIconPaintable> lookUp(
 
 void drawPixels(cairo_t* cairo, const Image& image, const platform::Rect& rect, cairo_filter_t filter)
 {
-    // Cairo only reads a surface that is used as a source.
+    // The cast is safe, because Cairo only reads a surface that is used as a source.
     auto* pixels = reinterpret_cast<unsigned char*>(const_cast<std::uint32_t*>(image.pixels().data()));
     auto* surface = cairo_image_surface_create_for_data(
         pixels, CAIRO_FORMAT_ARGB32, image.pixelWidth(), image.pixelHeight(), image.pixelWidth() * 4);

@@ -12,12 +12,13 @@
 
 namespace host::gtk {
 
-/// Shows images of the platform with the toolkit.
+/// Shows the platform's images with the toolkit.
 namespace ImagePaint {
 
-/// The pixels as a texture that keeps the image alive and copies nothing. Null for a named icon.
+/// Answers the pixels as a texture that keeps the image alive and copies nothing, or null for a named icon.
 ObjectRef<GdkPaintable> texture(const platform::Image& image);
-/// The icon of a named image in a size, symbolic ones in the widget's text colour; pixels as they are.
+/// Answers the icon of a named image in a size, symbolic ones in the widget's text colour. Pixels are
+/// answered as they are.
 ObjectRef<GdkPaintable> paintable(const platform::Image& image, GtkWidget* widget, int iconSize);
 /// Makes a GtkImage show an image in a square of `size` points.
 void show(GtkImage* widget, const platform::Image& image, int size);

@@ -16,7 +16,7 @@ namespace {
 
 constexpr int iconSize = 16;
 
-/// Ends a popover that has closed: not inside its own signal.
+/// Destroys a popover that has closed, but not inside its own signal.
 void endLater(GtkWidget* popover)
 {
     g_idle_add_once(
@@ -28,7 +28,7 @@ void endLater(GtkWidget* popover)
         g_object_ref(popover));
 }
 
-/// Where the keyboard was before a popover took it, to be given back when it closes.
+/// Gives the keyboard focus back to the widget that had it before the popover opened.
 void restoreFocus(GtkWidget* popover, GtkWidget* before)
 {
     auto* root = gtk_widget_get_root(popover);

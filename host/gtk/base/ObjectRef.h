@@ -42,7 +42,7 @@ public:
         ref._object = object;
         return ref;
     }
-    /// Adds a reference; a floating one, as a new widget has, becomes this one.
+    /// Adds a reference. A floating reference, as a new widget has, is taken over instead.
     static ObjectRef retain(T* object)
     {
         if (object)

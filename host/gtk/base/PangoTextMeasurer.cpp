@@ -9,10 +9,10 @@
 
 namespace host::gtk {
 
-using platform::Size;
 using kit::Font;
 using kit::FontMetrics;
 using kit::TextLimits;
+using platform::Size;
 
 namespace {
 
@@ -21,7 +21,7 @@ double points(int units)
     return static_cast<double>(units) / PANGO_SCALE;
 }
 
-/// Widgets have whole sizes: a fraction more than a whole point takes another point.
+/// Rounds up to whole points, because widgets have whole sizes.
 Size sizeOf(PangoLayout* layout)
 {
     PangoRectangle logical;

@@ -10,15 +10,15 @@
 
 namespace host::gtk {
 
-/// Measures texts with the fonts that the labels are shown in.
+/// Measures texts with the fonts in which the labels are shown.
 class PangoTextMeasurer : public kit::TextMeasurer {
 public:
     explicit PangoTextMeasurer(std::shared_ptr<const Theme> theme);
 
-    platform::Size measure(std::string_view text, const kit::Font& font,
-        const kit::TextLimits& limits) const override;
-    platform::Size measure(const kit::AttributedText& text, const kit::Font& font,
-        const kit::TextLimits& limits) const override;
+    platform::Size measure(
+        std::string_view text, const kit::Font& font, const kit::TextLimits& limits) const override;
+    platform::Size measure(
+        const kit::AttributedText& text, const kit::Font& font, const kit::TextLimits& limits) const override;
     kit::FontMetrics metrics(const kit::Font& font) const override;
 
     /// The theme's fonts or its window have changed.

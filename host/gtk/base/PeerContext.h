@@ -26,12 +26,12 @@ namespace host::gtk {
 
 class ViewPeer;
 
-/// Makes the native widget of a hosted view and keeps it in step: called for each change of the settings with
-/// the widget of the call before, null at first.
-using HostedViewMaker =
-    std::function<ObjectRef<GtkWidget>(kit::HostedView& view, GtkWidget* current)>;
+/// Makes the native widget of a hosted view and keeps it up to date. It is called for each change of the
+/// settings with the widget that it answered last, null at first.
+using HostedViewMaker = std::function<ObjectRef<GtkWidget>(kit::HostedView& view, GtkWidget* current)>;
 
-/// What the peers of one window share: its theme, its frames, and who shows what. Main thread only.
+/// The objects that the peers of one window share: the theme, the frames, and which peer shows which view.
+/// Main thread only.
 class PeerContext {
 public:
     PeerContext(std::shared_ptr<Theme> theme, std::shared_ptr<FrameScheduler> scheduler);
@@ -42,18 +42,18 @@ public:
 
     void add(const kit::View& view, ViewPeer& peer);
     void remove(const kit::View& view, const ViewPeer& peer);
-    /// The peer that shows a view; null: none.
+    /// Answers the peer that shows a view, or null.
     ViewPeer* peerOf(const kit::View& view) const;
 
     void setWidget(const kit::BarButtonItem& item, GtkWidget* widget);
     void removeWidget(const kit::BarButtonItem& item, const GtkWidget* widget);
-    /// The widget that shows an entry of a bar; null: none.
+    /// Answers the widget that shows an item of a bar, or null.
     GtkWidget* widgetOf(const kit::BarButtonItem& item) const;
 
     void setHostedViewMaker(const std::string& kind, HostedViewMaker maker);
     const HostedViewMaker* hostedViewMaker(const std::string& kind) const;
 
-    /// Colours and fonts have changed: every peer shows itself anew.
+    /// Colours or fonts have changed, so every peer shows its view again.
     void themeDidChange();
 
 private:

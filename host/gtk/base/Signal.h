@@ -12,8 +12,8 @@
 
 namespace host::gtk {
 
-/// A handler that is connected to a signal of an object. It is disconnected when this is destroyed; the
-/// object may be gone by then.
+/// A handler that is connected to a signal of an object. It is disconnected when this is destroyed, even if
+/// the object is gone by then.
 class SignalConnection {
 public:
     SignalConnection() = default;
@@ -23,7 +23,7 @@ public:
     ~SignalConnection();
 
     void disconnect();
-    /// While blocked, the handler does not hear of what the program itself does to the object.
+    /// While the handler is blocked, it is not told of changes that the program itself makes to the object.
     void block() const;
     void unblock() const;
 
@@ -59,7 +59,7 @@ namespace detail {
 template <typename Signature>
 struct SignalThunk;
 
-/// The user data of a signal comes last, at a place that depends on the signal: so the signature is spelled
+/// The user data of a signal comes last, at a place that depends on the signal, so the signature is spelled
 /// out.
 template <typename Result, typename... Arguments>
 struct SignalThunk<Result(Arguments...)> {
@@ -74,8 +74,8 @@ struct SignalThunk<Result(Arguments...)> {
 
 } // namespace detail
 
-/// Connects for as long as the object lives: the function must keep nothing that ends before. `Signature` as
-/// below.
+/// Connects for as long as the object lives, so the function must not refer to anything that is destroyed
+/// earlier. `Signature` is as below.
 template <typename Signature, typename Function>
 gulong connectForLife(gpointer object, const char* signal, Function&& function)
 {
@@ -85,7 +85,7 @@ gulong connectForLife(gpointer object, const char* signal, Function&& function)
         static_cast<GConnectFlags>(0));
 }
 
-/// Calls a function for a signal. `Signature` names the answer and the arguments between the object and the
+/// Calls a function for a signal. `Signature` names the result and the arguments between the object and the
 /// user data, as in `connectSignal<gboolean(guint, guint, GdkModifierType)>(keys, "key-pressed", ...)`.
 template <typename Signature, typename Function>
 [[nodiscard]] SignalConnection connectSignal(gpointer object, const char* signal, Function&& function)
@@ -94,7 +94,7 @@ template <typename Signature, typename Function>
     return SignalConnection(object, id);
 }
 
-/// For a property's "notify::name".
+/// Connects to a property's "notify::name".
 template <typename Function>
 [[nodiscard]] SignalConnection connectNotify(gpointer object, const char* signal, Function&& function)
 {

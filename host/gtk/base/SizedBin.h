@@ -10,7 +10,7 @@
 
 namespace host::gtk {
 
-/// A widget around one child that tells the size it gets, before the child is laid out in it.
+/// A widget around one child that reports its size before the child is laid out in it.
 class SizedBin : public CanvasClient {
 public:
     using ResizeHandler = std::function<void(platform::Size)>;
@@ -22,7 +22,7 @@ public:
 
     GtkWidget* widget() const { return _canvas.get(); }
     void setChild(GtkWidget* child);
-    /// As of the last layout; zero before the first one.
+    /// Answers the size as of the last layout, or zero before the first one.
     platform::Size size() const { return _size; }
 
     platform::Size canvasNaturalSize(double forWidth) override;

@@ -11,10 +11,10 @@
 
 namespace host::gtk::TextLayout {
 
-using platform::Image;
 using kit::AttributedText;
 using kit::Font;
 using kit::TextRun;
+using platform::Image;
 
 namespace {
 
@@ -92,7 +92,7 @@ Attributes attributes(const Theme& theme, const Font& font, const platform::Colo
 {
     Attributes list(pango_attr_list_new(), &pango_attr_list_unref);
     insert(list.get(), pango_attr_font_desc_new(theme.describe(font).get()), 0, G_MAXUINT);
-    // A name that is broken must not look as if it had hyphens.
+    // A broken name must not look as if it contained hyphens.
     insert(list.get(), pango_attr_insert_hyphens_new(FALSE), 0, G_MAXUINT);
     if (color && !(*color == platform::Color::black()))
         insertColor(list.get(), theme.resolve(*color, ColorUse::Content), 0, G_MAXUINT);
@@ -124,8 +124,8 @@ bool hasAttachments(const AttributedText& text)
     return std::ranges::any_of(text.runs(), [](const TextRun& run) { return run.attachment.has_value(); });
 }
 
-ObjectRef<PangoLayout> make(PangoContext* context, std::string_view characters, Attributes attributes,
-    const kit::TextLimits& limits)
+ObjectRef<PangoLayout> make(
+    PangoContext* context, std::string_view characters, Attributes attributes, const kit::TextLimits& limits)
 {
     auto layout = ObjectRef<PangoLayout>::adopt(pango_layout_new(context));
     pango_layout_set_text(layout.get(), characters.data(), static_cast<int>(characters.size()));

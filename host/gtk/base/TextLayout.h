@@ -15,23 +15,23 @@
 
 namespace host::gtk {
 
-/// Pango's view of the kit's texts, the same for measuring and for showing.
+/// Turns the kit's texts into Pango's, the same for measuring and for showing.
 namespace TextLayout {
 
 using Attributes = std::unique_ptr<PangoAttrList, decltype(&pango_attr_list_unref)>;
 
-/// Font and, when there is one, colour over a whole text.
+/// Answers attributes for the font and, when there is one, the colour of a whole text.
 Attributes attributes(const Theme& theme, const kit::Font& font, const platform::Color* color);
-/// Of a styled text whose pieces fall back on `font`. The byte offsets are those of `text(...)`.
-Attributes attributes(
-    const Theme& theme, const kit::AttributedText& text, const kit::Font& font);
-/// The characters, with one object replacement character for each image.
+/// Answers the attributes of a styled text. Pieces without a font get `font`. The byte offsets are those of
+/// `text(...)`.
+Attributes attributes(const Theme& theme, const kit::AttributedText& text, const kit::Font& font);
+/// Answers the characters, with one object replacement character for each image.
 std::string text(const kit::AttributedText& text);
 bool hasAttachments(const kit::AttributedText& text);
 
-ObjectRef<PangoLayout> make(PangoContext* context, std::string_view text, Attributes attributes,
-    const kit::TextLimits& limits);
-/// Draws a layout with its images; the left end of the first line's top is at (0, 0).
+ObjectRef<PangoLayout> make(
+    PangoContext* context, std::string_view text, Attributes attributes, const kit::TextLimits& limits);
+/// Draws a layout with its images. The top left corner of the first line is at (0, 0).
 void draw(cairo_t* cairo, PangoLayout* layout);
 
 } // namespace TextLayout

@@ -21,13 +21,13 @@ namespace StandardColors = kit::StandardColors;
 
 namespace {
 
-constexpr double bodyPointSize = 17; ///< of the kit's body text
+constexpr double bodyPointSize = 17; ///< points of the kit's body text
 constexpr double defaultDpi = 96;
-/// Of the text colour. Grey text must stand out from its background by 4.5 to 1, with high contrast by 7
-/// to 1.
+/// Shares of the text colour. Grey text needs a contrast of 4.5 to 1 to its background, or 7 to 1 with high
+/// contrast.
 constexpr float greyShare = 0.7F, strongGreyShare = 0.9F, lightGreyShare = 0.4F;
-/// The share of a row's second line in the style sheet: each further size would be one more font to find,
-/// which takes milliseconds of the start, and smaller ones are hard to read.
+/// The size of a row's second line in the style sheet, as a share of the body size. Each further size would
+/// be one more font to find, which takes milliseconds of the start, and smaller ones are hard to read.
 constexpr double smallestShare = 0.85;
 constexpr auto iconsPath = "/app/tarrow/Drive/icons";
 
@@ -51,15 +51,15 @@ const char* themeName(const Color& color, ColorUse use)
     return nullptr;
 }
 
-/// Points of the kit to the share of the body size that they have here.
+/// Turns a size in the kit's points into a share of the desktop's body size.
 double relativeSize(double pointSize)
 {
     const double ratio = pointSize / bodyPointSize;
     return ratio >= 1 ? ratio : std::max((1 + ratio) / 2, smallestShare);
 }
 
-/// The application has added its icons by the path of its identifier. To add them again would drop the icon
-/// theme that the toolkit has read on another thread meanwhile, and read it anew on this one.
+/// The application has already added its icons by the path of its identifier. Adding them again would drop
+/// the icon theme that the toolkit has meanwhile read on another thread, and read it again on this one.
 void addIcons(GtkIconTheme* icons)
 {
     const std::unique_ptr<char*, decltype(&g_strfreev)> paths(
@@ -72,7 +72,7 @@ void addIcons(GtkIconTheme* icons)
     gtk_icon_theme_add_resource_path(icons, iconsPath);
 }
 
-/// Icons and style sheet of our own, once for the process's display.
+/// Adds this program's icons and style sheet, once for the process's display.
 void installResources()
 {
     static bool isInstalled = false;
@@ -124,7 +124,7 @@ void Theme::changed() const
         _onChange();
 }
 
-/// The style sheet cannot ask for the contrast, but for a class of the window.
+/// Marks the window with a class for high contrast, because the style sheet cannot ask for it.
 void Theme::markContrast() const
 {
     if (!_reference)
@@ -155,7 +155,7 @@ GdkRGBA Theme::resolve(const Color& color, ColorUse use) const
         named(name, found);
         return found;
     }
-    // Grey text is the text colour, let through in part, so that it can be read on either background.
+    // Grey text is the text colour with some transparency, so that it can be read on either background.
     if (color == StandardColors::gray || color == StandardColors::lightGray) {
         if (named("view_fg_color", found))
             found.alpha *= color == StandardColors::lightGray ? lightGreyShare

@@ -15,8 +15,8 @@
 
 namespace host::gtk {
 
-/// What a colour is used for: the standard white is the theme's background only behind something, the
-/// standard black the theme's text colour only in front.
+/// Says what a colour is used for. The standard white becomes the theme's background only as a background,
+/// and the standard black the theme's text colour only as content.
 enum class ColorUse { Background, Content };
 
 /// The desktop's colours and fonts. Main thread only.
@@ -25,25 +25,25 @@ public:
     Theme();
     ~Theme();
 
-    /// Makes the program's icons and style sheet known to the toolkit: before the application is registered,
-    /// which then finds the icons by itself. Cheap to call again.
+    /// Registers the program's icons and style sheet with the toolkit. Call it before the application is
+    /// registered, which then finds the icons by itself. Further calls are cheap.
     static void registerResources();
 
-    /// A colour of the model as the theme has it: the standard colours follow light, dark and high contrast,
-    /// others stay what they are.
+    /// Answers the theme's colour for a colour of the model. The standard colours follow light, dark and high
+    /// contrast; others stay as they are.
     GdkRGBA resolve(const platform::Color& color, ColorUse use) const;
     bool isDark() const;
     bool animationsEnabled() const;
 
-    /// The theme's typeface in the size that stands for the font's. The body text has the desktop's own size;
-    /// smaller roles shrink half as much as they would on a phone's display, which keeps them legible.
+    /// Answers the theme's typeface in the size for a font. Body text has the desktop's own size. Smaller
+    /// roles shrink half as much as they would on a phone's display, so that they stay legible.
     using FontDescription = std::unique_ptr<PangoFontDescription, decltype(&pango_font_description_free)>;
     FontDescription describe(const kit::Font& font) const;
     ObjectRef<PangoContext> makePangoContext() const;
 
-    /// The widget whose style answers for the colours: the window.
+    /// Sets the widget whose style gives the colours, which is the window.
     void setReference(GtkWidget* widget);
-    /// Called after light, dark, contrast, font or animation settings have changed.
+    /// The callback runs after the light, dark, contrast, font or animation settings have changed.
     void setOnChange(std::function<void()> callback) { _onChange = std::move(callback); }
 
 private:

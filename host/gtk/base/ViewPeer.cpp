@@ -10,11 +10,11 @@
 
 namespace host::gtk {
 
-using platform::Point;
-using platform::Size;
 using kit::View;
 using kit::ViewChange;
 using kit::ViewChanges;
+using platform::Point;
+using platform::Size;
 
 namespace {
 
@@ -91,7 +91,7 @@ void ViewPeer::showAnew()
 void ViewPeer::viewDidChange(View&, ViewChanges changes)
 {
     _pending |= changes;
-    // Children are placed by the frames at the time of the allocation, so a move needs nothing else.
+    // Children are placed by their frames at the time of the allocation, so a move needs only that.
     if (changes.contains(ViewChange::Frame))
         queueAllocateInParent();
     _context->scheduler().schedule(this, [this] { mirrorPending(); });
@@ -125,7 +125,7 @@ void ViewPeer::mirror(View& shown, ViewChanges changes)
     }
     if (changes.contains(ViewChange::Enabled)) {
         gtk_widget_set_sensitive(_canvas.get(), shown.isEnabled());
-        // Assistive technology hears of it from the native widget alone.
+        // Assistive technology reads the state from the native widget alone.
         if (_native)
             gtk_widget_set_sensitive(_native.get(), shown.isEnabled());
     }
@@ -192,7 +192,7 @@ bool ViewPeer::grabFocus()
     return _native && gtk_widget_grab_focus(_native.get());
 }
 
-/// Lets the focus go where it is still here; the user may have moved it on already.
+/// Drops the focus if it is still in this view, because the user may have moved it already.
 void ViewPeer::dropFocus()
 {
     auto* root = gtk_widget_get_root(widget());
@@ -203,7 +203,7 @@ void ViewPeer::dropFocus()
 
 void ViewPeer::viewWantsFocus(View&, bool focus)
 {
-    // Later: the view may have been made only now, and its widget may not be in the window yet.
+    // This runs later, because the view may be new and its widget not in the window yet.
     const std::weak_ptr<ViewPeer> weak = weak_from_this();
     _context->scheduler().schedule(&_native, [weak, focus] {
         const auto self = weak.lock();

@@ -16,14 +16,14 @@ namespace host::gtk {
 
 class GestureFeed;
 
-/// Shows one view of the kit: a canvas widget that paints the view's style and drawing, holds the native
-/// widget of the view's kind if it has one, and places the subviews' peers at the frames of the model.
-/// Main thread only.
+/// Shows one view of the kit with a canvas widget. The canvas paints the view's style and drawing, holds the
+/// native widget of the view's class if it has one, and places the subviews' peers at the frames of the
+/// model. Main thread only.
 ///
 /// The view tells its peer of changes at once; the peer gathers them and mirrors them in the next frame,
-/// before the layout. A frame that changes costs an allocation, never a new measurement. Peer and view know
-/// each other weakly; a peer whose view is gone ends when the main loop is idle, so never inside a signal of
-/// its own.
+/// before the layout. A frame that changes costs an allocation, never a new measurement. Peer and view refer
+/// to each other weakly. A peer whose view is gone is destroyed when the main loop is idle, and so never
+/// inside a signal of its own.
 class ViewPeer : public kit::ViewObserver,
                  public CanvasClient,
                  public std::enable_shared_from_this<ViewPeer> {
@@ -34,23 +34,23 @@ public:
     ViewPeer(const ViewPeer&) = delete;
     ViewPeer& operator=(const ViewPeer&) = delete;
 
-    /// Observes the view and shows all of it, with its subviews. To be called once, right after it was made.
+    /// Observes the view and shows all of it, with its subviews. Call it once, right after the peer was made.
     void start();
 
     GtkWidget* widget() const { return _canvas.get(); }
-    GtkWidget* native() const { return _native.get(); } ///< null: this kind has none
+    GtkWidget* native() const { return _native.get(); } ///< null: this class has none
     std::shared_ptr<kit::View> view() const { return _view.lock(); }
     const std::vector<std::shared_ptr<ViewPeer>>& children() const { return _children; }
 
-    /// Makes this the root of a place in the toolkit's own layout: `onResize` is told the size that the place
-    /// has and brings it to the model, `fit` answers what the place should ask for (null: nothing).
+    /// Makes this peer the root of a place in the toolkit's own layout. `onResize` is told the size of the
+    /// place and sets it in the model; `fit` answers the size that the place should ask for (null: none).
     using ResizeHandler = std::function<void(platform::Size)>;
     using FittingSize = std::function<platform::Size(double forWidth)>;
     void setRoot(ResizeHandler onResize, FittingSize fit = {});
 
-    /// Everything is mirrored again in the next frame.
+    /// Mirrors everything again in the next frame.
     void showAnew();
-    /// Moves the keyboard focus here. False: the view does not take it.
+    /// Moves the keyboard focus to the view. Answers false when the view does not take it.
     virtual bool grabFocus();
 
     void viewDidChange(kit::View& view, kit::ViewChanges changes) override;
@@ -65,12 +65,13 @@ protected:
     PeerContext& context() const { return *_context; }
     const std::shared_ptr<PeerContext>& sharedContext() const { return _context; }
     void setNative(GtkWidget* native);
-    /// What tells assistive technology of the view.
+    /// Answers the widget that represents the view to assistive technology.
     virtual GtkWidget* spoken() const { return _native ? _native.get() : _canvas.get(); }
-    /// Where the subviews' widgets go, and how far their frames are moved there.
+    /// Answers the widget to which the subviews' widgets are added; the next one, by how much their frames
+    /// are moved in it.
     virtual GtkWidget* childContainer() const { return _canvas.get(); }
     virtual platform::Point childOrigin() const;
-    /// Brings changes of the model to the widgets.
+    /// Copies changes of the model to the widgets.
     virtual void mirror(kit::View& view, kit::ViewChanges changes);
     void allocateChildren();
     void connect(SignalConnection connection) { _connections.push_back(std::move(connection)); }
@@ -99,7 +100,7 @@ private:
     SignalConnections _connections;
 };
 
-/// Makes the peer of a view by the view's kind, started.
+/// Makes the peer for a view's class and starts it.
 std::shared_ptr<ViewPeer> makePeer(
     const std::shared_ptr<PeerContext>& context, const std::shared_ptr<kit::View>& view);
 

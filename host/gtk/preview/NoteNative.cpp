@@ -17,7 +17,7 @@ using screens::NoteView;
 
 namespace {
 
-constexpr int margin = 10; ///< around the text, points
+constexpr int margin = 10; ///< points around the text
 
 std::string textOf(GtkTextBuffer* buffer)
 {
@@ -29,7 +29,7 @@ std::string textOf(GtkTextBuffer* buffer)
     return copy;
 }
 
-/// The connections live as long as the widget.
+/// Keeps the connections for as long as the widget lives.
 void keep(GtkWidget* widget, SignalConnections connections)
 {
     g_object_set_data_full(G_OBJECT(widget), "trw-note-connections",
@@ -46,7 +46,7 @@ GtkWidget* makeText(const std::shared_ptr<NoteView>& note)
     gtk_text_view_set_right_margin(view, margin);
     gtk_text_view_set_top_margin(view, margin);
     gtk_text_view_set_bottom_margin(view, margin);
-    // Tab leads on to the buttons.
+    // The Tab key moves the focus to the buttons instead of writing a tab.
     gtk_text_view_set_accepts_tab(view, FALSE);
     auto* buffer = gtk_text_view_get_buffer(view);
     gtk_text_buffer_set_text(buffer, note->text().c_str(), static_cast<int>(note->text().size()));
@@ -69,11 +69,11 @@ void addNoteMaker(PeerContext& context)
         NoteView::kindName, [](kit::HostedView& hosted, GtkWidget* current) -> ObjectRef<GtkWidget> {
             if (current)
                 return ObjectRef<GtkWidget>::retain(current);
-            // The kind says what the view is.
+            // The cast is safe, because the kind of a hosted view decides its class.
             const auto note = std::static_pointer_cast<NoteView>(hosted.shared_from_this());
             auto* window = gtk_scrolled_window_new();
             gtk_widget_add_css_class(window, "note");
-            // The focus is the text's, never its frame's.
+            // The text takes the focus, and its frame does not.
             gtk_widget_set_focusable(window, FALSE);
             gtk_scrolled_window_set_policy(
                 GTK_SCROLLED_WINDOW(window), GTK_POLICY_NEVER, GTK_POLICY_AUTOMATIC);

@@ -7,7 +7,7 @@
 
 namespace host::gtk {
 
-/// Makes a context know notes: texts of several lines.
+/// Registers a maker for notes (texts of several lines) with a context.
 void addNoteMaker(PeerContext& context);
 
 } // namespace host::gtk

@@ -19,7 +19,7 @@ using screens::PreviewPagesView;
 
 namespace {
 
-/// The key of the detail's texture, beside those of the pages.
+/// The key of the detail's texture among those of the pages.
 constexpr std::size_t detailKey = std::numeric_limits<std::size_t>::max();
 constexpr GdkRGBA paper{1, 1, 1, 1};
 constexpr GdkRGBA paperEdge{0, 0, 0, 0.25F};
@@ -63,7 +63,7 @@ void PagesNative::start()
     const auto view = _view.lock();
     if (!view)
         return;
-    // A view that was shown before has a place.
+    // A view that was shown before returns to its place.
     const auto before = view->visiblePlace();
     previewZoomDidChange();
     if (before)
@@ -103,14 +103,14 @@ void PagesNative::addSelection()
             constexpr double reach = 60; // points to both sides: about a word
             const auto at = _scroller.toContent({x, y});
             _isHolding = true;
-            // From here on the finger selects, and scrolls no more.
+            // From here on the finger selects instead of scrolling.
             gtk_gesture_set_state(GTK_GESTURE(drag), GTK_EVENT_SEQUENCE_CLAIMED);
             if (const auto view = _view.lock())
                 view->userSelects({at.x - reach, at.y}, {at.x + reach, at.y});
         }));
 }
 
-/// A press without a way: what is longer selects.
+/// Recognises a tap that does not move. A longer press selects instead.
 void PagesNative::addTap()
 {
     auto* click = gtk_gesture_click_new();
@@ -128,7 +128,7 @@ void PagesNative::addTap()
         }));
 }
 
-/// Ctrl+Z, wherever the focus is: but a text that is being written takes back its own letters.
+/// Handles Ctrl+Z wherever the focus is, except in a text that is being written, which undoes its own edits.
 void PagesNative::addUndo()
 {
     auto* controller = gtk_shortcut_controller_new();

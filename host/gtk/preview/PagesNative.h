@@ -11,7 +11,7 @@
 
 namespace host::gtk {
 
-/// Shows a document's pages one below the other, with what is found and what is selected in them.
+/// Shows a document's pages one below the other, with the matches of a search and the selection.
 class PagesNative : public PreviewNative, private ZoomContent {
 public:
     explicit PagesNative(const std::shared_ptr<screens::PreviewPagesView>& view);
@@ -53,9 +53,9 @@ private:
     void updateLabel();
 
     std::weak_ptr<View> _view;
-    std::map<std::size_t, Shown> _shown; ///< textures, so that a picture is not handed over every frame
-    platform::Point _selectionStart, _pressed; ///< in the content; in the window
-    bool _isHolding = false; ///< a finger that was held selects
+    std::map<std::size_t, Shown> _shown; ///< textures, so that a picture is not uploaded in every frame
+    platform::Point _selectionStart, _pressed; ///< the former in content points, the latter in window points
+    bool _isHolding = false; ///< a finger was held, and selects
     ZoomScroller _scroller;
     SignalConnections _connections;
 };

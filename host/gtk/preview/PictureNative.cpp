@@ -18,7 +18,7 @@ namespace {
 
 constexpr int tileSide = 1024; ///< pixels
 
-/// The pixels of a part of an image, which they keep alive.
+/// Answers the pixels of a part of an image. They keep the image alive.
 ObjectRef<GdkTexture> partTexture(const Image& image, int x, int y, int width, int height)
 {
     const auto stride = static_cast<std::size_t>(image.pixelWidth());
@@ -48,7 +48,7 @@ PictureNative::~PictureNative()
 void PictureNative::start()
 {
     addShortcuts(widget(), _view);
-    // Nothing moves while nobody sees it.
+    // An animation runs only while the widget is visible.
     _connections.push_back(connectSignal<void()>(widget(), "map", [this] {
         gtk_widget_grab_focus(_scroller.canvas());
         scheduleFrame();
@@ -89,7 +89,7 @@ Size PictureNative::baseSize(Size window)
 {
     if (_picture.frames.empty())
         return _base = {};
-    // The window holds all of it; a picture with few pixels is not blown up.
+    // The window shows the whole picture, but a picture with few pixels is not enlarged.
     const double scale = std::max(1.0, frame().scale());
     const double width = std::max(_picture.sourceWidth, 1) / scale;
     const double height = std::max(_picture.sourceHeight, 1) / scale;
@@ -115,7 +115,7 @@ void PictureNative::drawTile(GtkSnapshot* snapshot, Tile& tile, double pointsPer
 {
     if (!tile.texture)
         tile.texture = partTexture(frame(), tile.x, tile.y, tile.width, tile.height);
-    // On whole device pixels, so that no seam shows between two tiles.
+    // Tiles end on whole device pixels, so that no seam shows between two of them.
     const double scale = gtk_widget_get_scale_factor(widget());
     const auto edge = [&](int pixel) { return std::round(pixel * pointsPerPixel * scale) / scale; };
     const double left = edge(tile.x), top = edge(tile.y);

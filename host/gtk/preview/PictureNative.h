@@ -11,7 +11,8 @@
 
 namespace host::gtk {
 
-/// Shows a picture in tiles, so that a large one costs what is seen of it; an animation frame by frame.
+/// Shows a picture in tiles, so that a large one costs only its visible part. It shows an animation frame by
+/// frame.
 class PictureNative : public PreviewNative, private ZoomContent {
 public:
     explicit PictureNative(const std::shared_ptr<screens::PreviewPictureView>& view);
@@ -29,7 +30,7 @@ public:
 private:
     struct Tile {
         int x, y, width, height; ///< pixels
-        ObjectRef<GdkTexture> texture; ///< made when it is first seen
+        ObjectRef<GdkTexture> texture; ///< made when the tile first becomes visible
     };
 
     platform::Size baseSize(platform::Size window) override;

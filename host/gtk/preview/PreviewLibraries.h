@@ -19,26 +19,28 @@ namespace host::gtk {
 class PreviewNative;
 class PrintablePages;
 
-/// What shows documents with large libraries: documents of pages, sources in colours, films. It comes from a
-/// module that is loaded when it is first wanted, so that the start does not pay for them.
+/// The parts of the preview that need large libraries: documents of pages, coloured source code, films. They
+/// come from a module that is loaded on first use, so that the start of the program does not pay for the
+/// libraries.
 class PreviewLibraries {
 public:
     virtual ~PreviewLibraries() = default;
 
-    /// Any thread.
+    /// May be called on any thread.
     virtual const platform::PagedDocumentOpener& pagedDocuments() const = 0;
     virtual const platform::TextDecoder& textDecoder() const = 0;
-    /// Any thread; may take long. Errors: why the document cannot be printed, in words.
+    /// Reads a PDF document to be printed. It may take long; any thread. The error says in a sentence why the
+    /// document cannot be printed.
     virtual platform::Result<std::shared_ptr<PrintablePages>> readPrintablePdf(
         const std::string& path) const = 0;
-    /// The native sides of views, not started yet. Main thread.
+    /// Make the native sides of views, which are not started yet. Main thread.
     virtual std::shared_ptr<PreviewNative> makeTextNative(
         const std::shared_ptr<screens::PreviewTextView>& view) const = 0;
     virtual std::shared_ptr<PreviewNative> makeMediaNative(
         const std::shared_ptr<screens::PreviewMediaView>& view) const = 0;
 };
 
-/// The one function that the module is asked for, and its name.
+/// The one function that the module exports, and its name.
 using MakePreviewLibraries = void(std::shared_ptr<PreviewLibraries>& made);
 inline constexpr const char* makePreviewLibrariesName = "trwMakePreviewLibraries";
 

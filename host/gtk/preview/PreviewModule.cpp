@@ -17,8 +17,8 @@ namespace host::gtk {
 
 namespace {
 
-/// All of its references are looked up at once: one that is missing makes it a module that is missing, not a
-/// process that ends later. It stays for good, because the types that it registers do.
+/// Loads the module. All of its symbols are resolved at once, so that a missing one means a missing module
+/// and not a crash later. The module is never unloaded, because the types that it registers stay.
 PreviewModule::Libraries loadFile(const std::string& path)
 {
     static constexpr platform::Operation op{"PreviewModule::loadFile"};

@@ -27,12 +27,12 @@ void show(GtkWidget* holder, PreviewView& view, const Native& native)
     native->start();
     view.setPreviewObserver(native);
     adw_bin_set_child(ADW_BIN(holder), native->widget());
-    // The native view keeps its widgets, their holder keeps it.
+    // The native view owns its widgets, and the holder keeps the native view alive.
     g_object_set_data_full(G_OBJECT(holder), nativeKey, std::make_unique<Native>(native).release(),
         [](gpointer held) { delete static_cast<Native*>(held); });
 }
 
-/// `fill` puts the native view of a new view into its holder, now or later.
+/// Registers a maker. `fill` puts the native view of a new view into its holder, at once or later.
 template <typename View, typename Fill>
 void addMaker(PeerContext& context, Fill fill)
 {
@@ -41,7 +41,7 @@ void addMaker(PeerContext& context, Fill fill)
             if (current)
                 return ObjectRef<GtkWidget>::retain(current);
             auto holder = ObjectRef<GtkWidget>::retain(adw_bin_new());
-            // The kind says what the view is.
+            // The cast is safe, because the kind of a hosted view decides its class.
             fill(holder, std::static_pointer_cast<View>(hosted.shared_from_this()));
             return holder;
         });

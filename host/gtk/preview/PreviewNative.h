@@ -24,11 +24,12 @@ public:
     virtual void start() = 0;
 
 protected:
-    /// Ctrl+F and the keys for the zoom, wherever the focus is in the window while the widget is seen.
+    /// Adds Ctrl+F and the keys for the zoom. They work wherever the focus is in the window while the widget
+    /// is visible.
     static void addShortcuts(GtkWidget* widget, const std::weak_ptr<screens::PreviewView>& view);
 };
 
-/// Makes a context know the views of previewed documents.
+/// Registers makers for the views of previewed documents with a context.
 void addPreviewMakers(PeerContext& context, const std::shared_ptr<PreviewModule>& previews);
 
 } // namespace host::gtk

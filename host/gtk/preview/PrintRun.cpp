@@ -14,7 +14,7 @@ namespace {
 
 using Ended = std::function<void(std::optional<platform::Error>)>;
 
-/// Lives as long as its operation.
+/// The state of one print operation, which lives as long as the operation.
 struct PrintRun {
     std::shared_ptr<PrintablePages> pages;
     Ended ended;
@@ -53,7 +53,7 @@ void done(GtkPrintOperation* operation, GtkPrintOperationResult result, gpointer
 
 void connect(GtkPrintOperation* operation, PrintRun* run)
 {
-    // The operation takes the run with it when it ends.
+    // The operation deletes the run when it is destroyed.
     g_object_set_data_full(
         G_OBJECT(operation), "print-run", run, [](gpointer data) { delete static_cast<PrintRun*>(data); });
     g_signal_connect(operation, "begin-print", G_CALLBACK(beginPrint), run);
@@ -77,7 +77,7 @@ void startPrinting(
         gtk_print_operation_set_export_filename(operation.get(), target.file.c_str());
         action = GTK_PRINT_OPERATION_ACTION_EXPORT;
     }
-    // The signal tells how it ended.
+    // The "done" signal reports how the operation ended.
     gtk_print_operation_run(operation.get(), action, target.dialogParent, nullptr);
 }
 

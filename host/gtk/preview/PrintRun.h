@@ -12,14 +12,14 @@
 
 namespace host::gtk {
 
-/// Where pages go: to the printer that the person chooses in a dialog over a window, or into a PDF file.
+/// The target of a print: the printer that the user chooses in a dialog over a window, or a PDF file.
 struct PrintTarget {
     GtkWindow* dialogParent = nullptr;
-    std::string file{}; ///< empty: ask
+    std::string file{}; ///< empty: show the dialog
 };
 
-/// Prints pages under a name. `ended` is called once, with what went wrong, or nothing when it was printed or
-/// the person cancelled. Main thread.
+/// Prints pages under a name. `ended` is called once, with the error, or with nothing when the pages were
+/// printed or the user cancelled. Main thread.
 void startPrinting(std::shared_ptr<PrintablePages> pages, const std::string& name, const PrintTarget& target,
     std::function<void(std::optional<platform::Error>)> ended);
 

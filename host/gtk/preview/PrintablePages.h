@@ -12,13 +12,14 @@
 
 namespace host::gtk {
 
-/// A document's content, ready to be drawn on paper.
+/// The content of a document, ready to be drawn on paper.
 class PrintablePages {
 public:
     virtual ~PrintablePages() = default;
-    /// Divides the content into pages for this paper; their number, at least 1. Main thread, before draw().
+    /// Divides the content into pages for this paper and answers their number, at least 1. Main thread,
+    /// before draw().
     virtual int paginate(GtkPrintContext* paper) = 0;
-    /// `page` counts from 0. Main thread.
+    /// Draws a page; `page` counts from 0. Main thread.
     virtual void draw(GtkPrintContext* paper, int page) = 0;
 };
 
@@ -26,15 +27,15 @@ class PreviewModule;
 
 enum class PrintableKind : int { Pdf, Picture, Text };
 
-/// Reads a document; a PDF document with the libraries of the previews. Any thread; may take long. Errors:
-/// what the file is damaged or too large for, in words.
+/// Reads a document, a PDF document with the libraries of the previews. It may take long; any thread. The
+/// error says in a sentence that the file is damaged or too large.
 platform::Result<std::shared_ptr<PrintablePages>> readPrintablePages(
     const std::string& path, PrintableKind kind, const PreviewModule& previews);
 
-/// Scales what is drawn next to fit the paper, centred, never enlarged beyond `largest`.
+/// Scales the drawing to fit the paper, centred and never enlarged beyond `largest`.
 void fitOnPaper(GtkPrintContext* paper, double width, double height, double largest);
-/// Why a document cannot be printed: words that are looked up, with what a library says. Takes that over;
-/// null: none.
+/// Answers the error for a document that cannot be printed: a message that is translated here, with the
+/// library's own text. Takes over `error`; null means none.
 platform::Error printingError(const char* words, GError* error);
 
 } // namespace host::gtk

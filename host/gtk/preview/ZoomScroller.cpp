@@ -18,9 +18,9 @@ using screens::PreviewView;
 
 namespace {
 
-constexpr double closeLook = 2.5; ///< the zoom that a double tap goes to
+constexpr double closeLook = 2.5; ///< the zoom after a double tap
 constexpr double wheelStep = 1.15;
-constexpr double arrowStep = 0.1, pageStep = 0.9; ///< of the window
+constexpr double arrowStep = 0.1, pageStep = 0.9; ///< shares of the window
 
 void configure(GtkAdjustment* adjustment, double value, double content, double window)
 {
@@ -36,12 +36,12 @@ ZoomScroller::ZoomScroller(ZoomContent& content, GtkAccessibleRole role, Drag dr
     , _window(ObjectRef<GtkWidget>::retain(gtk_scrolled_window_new()))
     , _canvas(ZoomCanvas::make(role))
 {
-    // Places of pages and pictures count from the left in every language.
+    // Pages and pictures are placed from the left in every language.
     gtk_widget_set_direction(widget(), GTK_TEXT_DIR_LTR);
     gtk_widget_set_direction(_canvas, GTK_TEXT_DIR_LTR);
     ZoomCanvas::setClient(_canvas, this);
     gtk_scrolled_window_set_child(GTK_SCROLLED_WINDOW(widget()), _canvas);
-    // The keyboard goes to what scrolls here, not to its frame.
+    // The canvas takes the keyboard focus, and its scrolled window does not.
     gtk_widget_set_focusable(widget(), FALSE);
     addPinch();
     addWheel();
@@ -64,13 +64,13 @@ void ZoomScroller::addPinch()
     _connections.push_back(connectSignal<void(GdkEventSequence*)>(pinch, "begin", [this, pinch](auto*) {
         _pinchStart = _zoom;
         _pinched.reset();
-        // One of the two fingers has begun to scroll.
+        // One of the two fingers has already begun to scroll, so this gesture claims the touch.
         gtk_gesture_set_state(pinch, GTK_EVENT_SEQUENCE_CLAIMED);
     }));
     _connections.push_back(connectSignal<void(GdkEventSequence*)>(pinch, "update", [this, pinch](auto*) {
         Point center{_windowSize.width / 2, _windowSize.height / 2};
         gtk_gesture_get_bounding_box_center(pinch, &center.x, &center.y);
-        // What the fingers are on stays between them.
+        // The content stays under the fingers.
         if (const auto last = std::exchange(_pinched, center)) {
             const auto seen = visible();
             scrollTo({seen.x - center.x + last->x, seen.y - center.y + last->y});
@@ -122,7 +122,7 @@ void ZoomScroller::addDrag()
     _connections.push_back(
         connectSignal<void(double, double)>(drag, "drag-update", [this, drag](double x, double y) {
             auto* device = gtk_gesture_get_device(GTK_GESTURE(drag));
-            // A finger is followed by the scrolled window, with its momentum.
+            // The scrolled window follows a finger by itself, with its momentum.
             if (device && gdk_device_get_source(device) == GDK_SOURCE_TOUCHSCREEN)
                 return;
             scrollTo({_dragStart.x - x, _dragStart.y - y});
@@ -268,7 +268,7 @@ void ZoomScroller::zoomCanvasAllocate(int width, int height)
     _windowSize = window;
     if (isFirst)
         return place(std::exchange(_wanted, std::nullopt).value_or(Point{}));
-    // In another window the same part of the content stays at the corner.
+    // In a window of another size the same part of the content stays in the corner.
     const auto moved = [](double at, double from, double to) { return from > 0 ? at * to / from : 0; };
     place({moved(seen.x, before.width, _base.width), moved(seen.y, before.height, _base.height)});
 }
@@ -276,7 +276,8 @@ void ZoomScroller::zoomCanvasAllocate(int width, int height)
 void ZoomScroller::zoomCanvasSnapshot(GtkSnapshot* snapshot)
 {
     const auto seen = visible();
-    // On whole device pixels: what the content lines up with them stays sharp and without seams.
+    // The origin lies on whole device pixels, so that content that is aligned to it stays sharp and without
+    // seams.
     const double scale = gtk_widget_get_scale_factor(_canvas);
     const auto whole = [scale](
                            double points) { return static_cast<float>(std::round(points * scale) / scale); };

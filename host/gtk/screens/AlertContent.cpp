@@ -16,8 +16,8 @@ namespace host::gtk {
 namespace {
 
 constexpr double fieldHeight = 44; ///< points
-constexpr double assumedWidth = 280; ///< of the content, before the alert has a width
-constexpr std::size_t standingButtons = 3; ///< a low window has room for so many below the text
+constexpr double assumedWidth = 280; ///< width of the content before the alert has a width
+constexpr std::size_t standingButtons = 3; ///< so many buttons fit below the text in a low window
 constexpr std::size_t longestTitleBesideAnother = 14; ///< characters
 
 GtkWidget* makeLabel(const char* styleClass)
@@ -26,7 +26,7 @@ GtkWidget* makeLabel(const char* styleClass)
     gtk_label_set_wrap(GTK_LABEL(label), TRUE);
     gtk_label_set_wrap_mode(GTK_LABEL(label), PANGO_WRAP_WORD_CHAR);
     gtk_label_set_justify(GTK_LABEL(label), GTK_JUSTIFY_CENTER);
-    // A name that is broken must not look as if it had hyphens.
+    // A broken name must not look as if it contained hyphens.
     auto* attributes = pango_attr_list_new();
     pango_attr_list_insert(attributes, pango_attr_insert_hyphens_new(FALSE));
     gtk_label_set_attributes(GTK_LABEL(label), attributes);
@@ -36,7 +36,7 @@ GtkWidget* makeLabel(const char* styleClass)
     return label;
 }
 
-/// Two short buttons stand beside each other, others in a column.
+/// Two buttons with short titles stand side by side. Others stand in a column.
 GtkOrientation buttonOrientation(const kit::AlertController& alert)
 {
     const auto& actions = alert.actions();
@@ -46,7 +46,8 @@ GtkOrientation buttonOrientation(const kit::AlertController& alert)
     return isRow ? GTK_ORIENTATION_HORIZONTAL : GTK_ORIENTATION_VERTICAL;
 }
 
-/// The preferred action; without one, and in every sheet, the one that cancels.
+/// Answers whether a button stands out: the preferred action does, and without one, and in every sheet, the
+/// cancel action.
 bool standsOut(const kit::AlertAction& action, const kit::AlertController& alert)
 {
     const auto preferred = alert.preferredAction();
@@ -75,7 +76,7 @@ bool focusWithin(GtkWidget* widget)
 
 } // namespace
 
-/// Gathers what the alert tells, once a frame.
+/// Gathers the alert's changes and shows them once a frame.
 class AlertContent::Observer : public kit::AlertObserver {
 public:
     explicit Observer(AlertContent& content)
@@ -121,7 +122,7 @@ AlertContent::~AlertContent()
     }
 }
 
-/// What does not fit a low window is scrolled, a few buttons stay.
+/// Content that does not fit a low window scrolls. A few buttons stay in place.
 void AlertContent::buildBody()
 {
     gtk_widget_add_css_class(_body, "alert-body");
@@ -137,7 +138,7 @@ void AlertContent::addFields(const Alert& alert)
         auto peer = std::make_shared<TextFieldPeer>(_context, field);
         peer->start();
         peer->setOnReturn([this] { returnPressed(); });
-        // The alert gives its fields their places; the model's own frames have no part in it.
+        // The alert places its fields itself, so the frames of the model do not count.
         peer->setRoot([](platform::Size) {}, [](double) { return platform::Size{0, fieldHeight}; });
         if (field->accessibility().label.empty() && field->placeholder().empty())
             peer->setAccessibleName(alert.message().empty() ? alert.title() : alert.message());
@@ -241,7 +242,8 @@ void AlertContent::focus()
         _peers.front()->grabFocus();
         return;
     }
-    // What is written in an alert is what it is there for.
+    // A native view in an alert, such as a note to be written, is the purpose of the alert, so it gets the
+    // focus.
     const auto content = alert->contentViewController();
     const bool isHosted = content && std::dynamic_pointer_cast<kit::HostedView>(content->view());
     if (isHosted && !_peers.empty() && focusWithin(_peers.front()->widget()))

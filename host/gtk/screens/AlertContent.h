@@ -40,7 +40,7 @@ private:
     std::weak_ptr<Alert> _alert;
     ObjectRef<GtkWidget> _card;
     GtkWidget *_lines, *_body, *_title, *_message, *_buttonBox = nullptr;
-    std::vector<GtkWidget*> _buttons; ///< in the order of the actions
+    std::vector<GtkWidget*> _buttons; ///< in the order of the alert's actions
     std::vector<std::shared_ptr<ViewPeer>> _peers;
     std::shared_ptr<Observer> _observer;
     SignalConnections _connections;

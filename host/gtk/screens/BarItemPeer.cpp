@@ -17,7 +17,7 @@ using platform::Size;
 namespace {
 
 constexpr int iconSize = 16;
-constexpr double barHeight = 44; ///< of what stands in a bar, points
+constexpr double barHeight = 44; ///< points; the height of an item's own view
 
 const char* iconOf(kit::SystemItem item)
 {
@@ -35,7 +35,7 @@ const char* iconOf(kit::SystemItem item)
     }
 }
 
-/// A standard item has the platform's name for it, in English until here.
+/// Answers the name of an item. The kit names standard items in English; the name is translated here.
 std::string nameOf(const kit::BarButtonItem& item)
 {
     const auto& name = item.accessibilityLabel();
@@ -82,7 +82,8 @@ std::shared_ptr<BarItemPeer> BarItemPeer::make(
     return peer;
 }
 
-BarItemPeer::BarItemPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::BarButtonItem>& item)
+BarItemPeer::BarItemPeer(
+    std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::BarButtonItem>& item)
     : _context(std::move(context))
     , _item(item)
     , _key(item.get())
@@ -105,7 +106,7 @@ void BarItemPeer::showCustomView(const std::shared_ptr<kit::View>& view)
 {
     _customPeer = makeEmbeddedPeer(_context, view, barHeight);
     _widget = ObjectRef<GtkWidget>::retain(_customPeer->widget());
-    // A view without a wish of its own lays itself out in what the bar has left.
+    // A view without a width of its own takes the space that the bar has left.
     const bool wantsAll = view->intrinsicContentSize().width <= 0;
     gtk_widget_set_hexpand(widget(), wantsAll);
     gtk_widget_set_valign(widget(), GTK_ALIGN_FILL);

@@ -13,20 +13,18 @@ namespace host::gtk {
 
 class ViewPeer;
 
-/// Shows one entry of a bar that is no space: a button, or the entry's own view. Main thread only.
-class BarItemPeer : public kit::BarButtonItemObserver,
-                    public std::enable_shared_from_this<BarItemPeer> {
+/// Shows one item of a bar that is not a space: as a button, or as the item's own view. Main thread only.
+class BarItemPeer : public kit::BarButtonItemObserver, public std::enable_shared_from_this<BarItemPeer> {
 public:
-    static std::shared_ptr<BarItemPeer> make(const std::shared_ptr<PeerContext>& context,
-        const std::shared_ptr<kit::BarButtonItem>& item);
-    BarItemPeer(
-        std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::BarButtonItem>& item);
+    static std::shared_ptr<BarItemPeer> make(
+        const std::shared_ptr<PeerContext>& context, const std::shared_ptr<kit::BarButtonItem>& item);
+    BarItemPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::BarButtonItem>& item);
     ~BarItemPeer() override;
 
     GtkWidget* widget() const { return _widget.get(); }
     std::shared_ptr<kit::BarButtonItem> item() const { return _item.lock(); }
 
-    /// In a narrow bar an entry that has a compact image shows it in place of its title.
+    /// In a narrow bar an item with a compact image shows it in place of its title.
     void setNarrow(bool narrow);
 
     void barButtonItemDidChange(kit::BarButtonItem& item) override;
@@ -46,8 +44,8 @@ private:
     bool _isNarrow = false;
 };
 
-/// A view of the kit at a place of its own in the toolkit's layout: the place asks for the size that the view
-/// wants, at least `minimumHeight`, and the view gets the size of the place.
+/// Places a view of the kit in the toolkit's layout. The place asks for the size that the view wants, at
+/// least `minimumHeight` high, and the view gets the size of the place.
 std::shared_ptr<ViewPeer> makeEmbeddedPeer(const std::shared_ptr<PeerContext>& context,
     const std::shared_ptr<kit::View>& view, double minimumHeight);
 

@@ -7,8 +7,9 @@ namespace host::gtk {
 
 namespace {
 
-/// The toolkit draws a window's first frame before anything else that waits. What the main queue has for it
-/// by now, such as the rows of its list, would only be seen in a second frame.
+/// Shows the window after the work that waits on the main queue. The toolkit would otherwise draw the
+/// window's first frame before, and the results of that work, such as the rows of a list, would appear only
+/// in the second frame.
 void showAfterWaitingWork(const std::weak_ptr<WindowPeer>& peer)
 {
     using Held = std::weak_ptr<WindowPeer>;
@@ -17,7 +18,7 @@ void showAfterWaitingWork(const std::weak_ptr<WindowPeer>& peer)
             shown->show();
         return G_SOURCE_REMOVE;
     };
-    // The main queue has the same priority, and comes first.
+    // The main queue has the same priority and was posted to before.
     g_idle_add_full(GDK_PRIORITY_REDRAW, show, std::make_unique<Held>(peer).release(),
         [](gpointer held) { delete static_cast<Held*>(held); });
 }

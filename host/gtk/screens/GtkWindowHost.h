@@ -14,16 +14,16 @@ namespace host::gtk {
 /// Shows the application's window. Main thread only.
 class GtkWindowHost : public kit::WindowHost {
 public:
-    /// `application` may be null: windows then stand for themselves.
+    /// `application` may be null; windows then belong to no application.
     GtkWindowHost(
         AdwApplication* application, const WindowSize& size, std::shared_ptr<PreviewModule> previews);
 
     void showWindow(const std::shared_ptr<kit::Window>& window) override;
-    /// The window that is shown; null: none.
+    /// Answers the window that is shown, or null.
     const std::shared_ptr<WindowPeer>& windowPeer() const { return _peer; }
-    /// Called for each window before it is on the screen.
+    /// The callback runs for each window before it is on the screen.
     void setOnShow(std::function<void(WindowPeer&)> callback) { _onShow = std::move(callback); }
-    /// Takes the window away.
+    /// Closes the window.
     void close() { _peer.reset(); }
 
 private:

@@ -22,13 +22,14 @@ namespace {
 
 constexpr int titleLines = 2;
 
-/// The same for as long as one device shows one document.
+/// Answers the same key for as long as one device shows one document.
 std::string keyOf(const ActivityOffer& offer)
 {
     return offer.deviceIdentifier + '\n' + offer.document.path();
 }
 
-/// A toast's own title has one line, in which a phone would show neither the name nor the device in full.
+/// Makes a title of several lines, because a toast's own title has one line, in which a phone would show
+/// neither the name nor the device in full.
 GtkWidget* makeTitle(const ActivityOffer& offer)
 {
     using screens::displayName;
@@ -125,7 +126,8 @@ void HandOverToasts::takeAway()
         adw_toast_dismiss(toast.get());
 }
 
-/// The document may have gone since it was offered: that is found out before the stack is touched.
+/// Continues with an offered document. The document is looked up first, because it may have gone since it was
+/// offered, and the stack must then stay as it is.
 void HandOverToasts::chosen(const ActivityOffer& offer)
 {
     services().cloudDocumentService().items().decodeBookmark(bookmarkOf(offer.activity),

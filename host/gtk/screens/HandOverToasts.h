@@ -19,21 +19,22 @@
 
 namespace host::gtk {
 
-/// Offers, at the bottom of the window, to go on with what another device of the account shows. One that the
-/// user dismissed or took does not come back until the device shows something else. Main thread only.
+/// Shows a toast at the bottom of the window that offers to continue with the document that another device of
+/// the account shows. An offer that the user dismissed or took does not come back until the device shows
+/// another document. Main thread only.
 class HandOverToasts : public std::enable_shared_from_this<HandOverToasts> {
 public:
     using Continue = std::function<void(const platform::UserActivity&)>;
-    /// Called when the document of an offer that the user took can't be found any more.
+    /// Called when the document of an offer that the user took cannot be found any more.
     using Fail = std::function<void(const platform::UserActivity&, const platform::Error&)>;
 
-    /// Shows what is offered now, and follows the installed service's offers.
+    /// Shows the current offer and follows the offers of the installed service.
     static std::shared_ptr<HandOverToasts> make(
         AdwToastOverlay* overlay, Continue continueActivity, Fail failed);
     HandOverToasts(AdwToastOverlay* overlay, Continue continueActivity, Fail failed);
     ~HandOverToasts();
 
-    /// The toast on the screen; null: none.
+    /// Answers the toast on the screen, or null.
     AdwToast* toast() const { return _toast.get(); }
 
 private:
@@ -47,9 +48,9 @@ private:
     Fail _fail;
     platform::Observation _offers;
     ObjectRef<AdwToast> _toast;
-    SignalConnections _connections; ///< of the toast
-    std::string _shown; ///< what the toast is about
-    std::set<std::string> _settled; ///< what the user dismissed or took
+    SignalConnections _connections; ///< connections to the toast
+    std::string _shown; ///< key of the offer in the toast
+    std::set<std::string> _settled; ///< keys of the offers that the user dismissed or took
 };
 
 } // namespace host::gtk

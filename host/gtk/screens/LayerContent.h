@@ -7,12 +7,12 @@
 
 namespace host::gtk {
 
-/// What a layer shows.
+/// The content of a layer.
 class LayerContent {
 public:
     virtual ~LayerContent() = default;
     virtual GtkWidget* widget() const = 0;
-    /// Puts the keyboard focus where the user goes on.
+    /// Gives the keyboard focus to the widget with which the user continues.
     virtual void focus() = 0;
 };
 

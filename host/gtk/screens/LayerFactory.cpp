@@ -19,10 +19,10 @@ namespace host::gtk {
 
 namespace {
 
-constexpr int popoverWidth = 320, popoverHeight = 420; ///< of a screen in a popover, points
-constexpr int widestPopover = 360; ///< its arrow and shadow included
+constexpr int popoverWidth = 320, popoverHeight = 420; ///< points; the size of a screen in a popover
+constexpr int widestPopover = 360; ///< points, with arrow and shadow
 
-/// A whole screen as the content of a layer.
+/// Shows a whole screen as the content of a layer.
 class ScreenContent : public LayerContent {
 public:
     ScreenContent(
@@ -53,7 +53,8 @@ std::optional<GdkRectangle> boundsIn(GtkWidget* canvas, GtkWidget* widget, std::
         std::max(1, whole(rect.width)), std::max(1, whole(rect.height))};
 }
 
-/// The rectangle of a view, which may be one that only marks a place in another that is shown.
+/// Answers the rectangle of a view in the window. The view may only mark a place inside another view that is
+/// shown.
 std::optional<GdkRectangle> boundsIn(
     GtkWidget* canvas, const PeerContext& context, const kit::View& view, const platform::Rect& rect)
 {
@@ -70,7 +71,7 @@ std::optional<GdkRectangle> boundsIn(
     return boundsIn(canvas, context.peerOf(*shown)->widget(), view.convertRect(rect, *shown));
 }
 
-/// Where a popover points at, in the window; nothing when there is no such place now.
+/// Answers the place in the window at which a popover points, or nothing when there is no such place now.
 std::optional<GdkRectangle> anchorOf(
     const PeerContext& context, GtkWidget* canvas, const kit::PopoverAnchor& anchor)
 {
@@ -85,7 +86,8 @@ std::optional<GdkRectangle> anchorOf(
     return std::nullopt;
 }
 
-/// Beside the anchor where only such arrows are allowed and there is room, else towards the window's middle.
+/// Answers the side for a popover: beside the anchor when only such arrows are allowed and there is room,
+/// else towards the window's middle.
 GtkPositionType sideOf(const kit::PopoverAnchor& anchor, const GdkRectangle& place, platform::Size window)
 {
     const auto* view = std::get_if<kit::ViewAnchor>(&anchor);

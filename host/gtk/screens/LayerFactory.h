@@ -15,19 +15,19 @@ class ViewController;
 
 namespace host::gtk {
 
-/// Where layers go: over `overlay`, popovers on `canvas`, in a window of this size.
+/// Where layers are added: over `overlay`, popovers on `canvas`, in a window of this size.
 struct LayerSite {
     GtkOverlay* overlay;
     GtkWidget* canvas;
     platform::Size size;
 };
 
-/// Makes the layer of a presented screen, by the kind of screen, its style and the window's width: in a
+/// Makes the layer of a presented screen, by the screen's class, its style and the window's width. In a
 /// narrow window an action sheet stands at the bottom edge, in a wide one it is a popover at its anchor.
 std::unique_ptr<PresentedLayer> makeLayer(const std::shared_ptr<PeerContext>& context, const LayerSite& site,
     const std::shared_ptr<kit::ViewController>& screen);
 
-/// A window of at least this width has popovers and sheets, a narrower one is filled.
+/// A window of at least this width shows popovers and sheets. In a narrower one a screen fills the window.
 inline constexpr double wideWindow = 600; ///< points
 
 } // namespace host::gtk

@@ -23,8 +23,8 @@ GtkWidget* makeIconButton(const char* icon, const std::string& name)
     return button;
 }
 
-/// The desktop's own window buttons with only the one that closes, where the desktop has it; a phone has
-/// none.
+/// Answers a layout of the desktop's window buttons with only the close button, if the desktop has one. A
+/// phone has none.
 std::string closeButtonOnly()
 {
     char* layout = nullptr;
@@ -37,7 +37,7 @@ std::string closeButtonOnly()
     return close < all.find(':') ? "close:" : ":close";
 }
 
-/// Whether a person could press something now: it is shown, and nothing lies over it.
+/// Answers whether a user could press a widget now: it is visible and nothing lies over it.
 bool isInReach(GtkWidget* widget)
 {
     bool takesKeys = gtk_widget_get_mapped(widget) && gtk_widget_is_sensitive(widget);
@@ -46,7 +46,7 @@ bool isInReach(GtkWidget* widget)
     return takesKeys;
 }
 
-/// A key that does something wherever the keyboard is, as long as the widget is in reach.
+/// Adds a key that works wherever the keyboard focus is, as long as the widget is in reach.
 GtkEventController* addShortcut(
     GtkWidget* widget, guint key, GdkModifierType modifiers, GtkShortcutFunc does, gpointer data = nullptr)
 {
@@ -59,7 +59,8 @@ GtkEventController* addShortcut(
     return shortcuts;
 }
 
-/// Presses a button at once: its own activation lets a quarter of a second pass, and the next keys with it.
+/// Presses a button at once. The button's own activation takes a quarter of a second, in which the next keys
+/// would be lost.
 gboolean pressByKey(GtkWidget* button, GVariant*, gpointer)
 {
     const bool isPressed = isInReach(button);
@@ -70,7 +71,7 @@ gboolean pressByKey(GtkWidget* button, GVariant*, gpointer)
 
 gboolean callByKey(GtkWidget* bar, GVariant*, gpointer data)
 {
-    // It may take the bar's own handler away.
+    // The function is copied, because it may replace the bar's own handler.
     const auto call = *static_cast<std::function<void()>*>(data);
     const bool isCalled = call && isInReach(bar);
     if (isCalled)

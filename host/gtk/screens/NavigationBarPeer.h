@@ -26,12 +26,11 @@ public:
     GtkWidget* backButton() const { return _back; }
     void setOnBack(std::function<void()> callback) { _onBack = std::move(callback); }
 
-    /// `hasBackTarget` says whether there is a screen to go back to.
+    /// Shows an item. `hasBackTarget` says whether there is a screen to go back to.
     void show(const kit::NavigationItem& item, bool hasBackTarget);
-    /// A narrow bar keeps of the window's own buttons only the one that closes it, and of its entries the
-    /// compact images.
+    /// A narrow bar shows only the close button of the window's buttons, and the compact images of its items.
     void setNarrow(bool narrow);
-    /// Whether the window's own buttons stand in this bar.
+    /// Says whether the window's own buttons stand in this bar.
     void setWindowButtons(bool shown);
 
 private:

@@ -40,8 +40,8 @@ NavigationPeer::NavigationPeer(std::shared_ptr<PeerContext> context,
         _leaflet.get(), "notify::child-transition-running", [this] { transitionRunningChanged(); }));
 }
 
-/// Under X the gestures of the leaflet wait for ever for the end of a touch that a list in it took over, and
-/// follow no finger any more.
+/// Resets the leaflet's gestures when a first finger touches. Under X they otherwise wait for ever for the
+/// end of a touch that a list inside took over, and follow no finger any more.
 void NavigationPeer::forgetFingersThatLeft()
 {
     auto* events = gtk_event_controller_legacy_new();
@@ -125,7 +125,7 @@ void NavigationPeer::showMoving(const kit::NavigationTransition& transition)
     page->load();
     const auto from = knownPageOf(transition.from);
     if (from && transition.kind == kit::NavigationKind::Pop) {
-        // The page below may have been made only now, behind the one that goes.
+        // The page below may be new and therefore lie in front of the leaving one.
         adw_leaflet_reorder_child_after(leaflet(), from->widget(), page->widget());
     } else if (from) {
         adw_leaflet_reorder_child_after(leaflet(), page->widget(), from->widget());
@@ -140,7 +140,7 @@ void NavigationPeer::showMoving(const kit::NavigationTransition& transition)
 void NavigationPeer::showWithoutMovement(const Screen& screen)
 {
     _mirroring = true;
-    // The leaflet slides from one page to another; without another page it has nothing to slide from.
+    // The leaflet slides only from one page to another, so the first page just appears.
     auto before = std::exchange(_pages, {});
     for (const auto& page : before)
         adw_leaflet_remove(leaflet(), page->widget());
@@ -173,8 +173,8 @@ void NavigationPeer::transitionRunningChanged()
         settle();
 }
 
-/// A swipe shows the page below from its beginning, and only its end says whether it went back. If the model
-/// will not follow, the top page comes back.
+/// A swipe shows the page below from its beginning, and only its end tells whether the user went back. When
+/// the model does not go back, the top page is shown again.
 void NavigationPeer::swipedAway(const ScreenPage& top)
 {
     const auto keepsSelf = shared_from_this();
@@ -186,7 +186,7 @@ void NavigationPeer::swipedAway(const ScreenPage& top)
     _mirroring = false;
 }
 
-/// The top screen stands: what waits for that runs, and the pages are brought in order in the next frame.
+/// The movement has ended: the waiting callbacks run, and the pages are put in order in the next frame.
 void NavigationPeer::settle()
 {
     const auto keepsSelf = weak_from_this().lock();
@@ -238,8 +238,8 @@ void NavigationPeer::ensurePageBelowTop()
     hideAllButTop();
 }
 
-/// The leaflet does not show its other pages, but leaves them to assistive technology, and the one that goes
-/// to fingers.
+/// Hides all pages but the top one. The leaflet does not draw the others, but it leaves them visible to
+/// assistive technology, and the leaving one to touches.
 void NavigationPeer::hideAllButTop() const
 {
     const auto top = topPage();

@@ -35,7 +35,7 @@ public:
     void focus() override;
 
     AdwLeaflet* leaflet() const { return ADW_LEAFLET(_leaflet.get()); }
-    /// The page of the screen on top; null: the stack is empty.
+    /// Answers the page of the screen on top, or null when the stack is empty.
     std::shared_ptr<ScreenPage> topPage() const;
 
     void navigationWillTransition(kit::NavigationController& controller,

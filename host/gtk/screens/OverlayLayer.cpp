@@ -43,7 +43,7 @@ OverlayLayer::OverlayLayer(GtkOverlay* overlay, std::unique_ptr<LayerContent> co
 {
     place(layerPlace);
     connectOutside(std::move(onOutside));
-    // Not a revealer: what it holds takes no key before the first frame.
+    // A revealer is not used here, because its content takes no key before the first frame.
     gtk_overlay_add_overlay(overlay, _backdrop.get());
 }
 
@@ -53,7 +53,7 @@ OverlayLayer::~OverlayLayer()
     _onPressed.disconnect();
     if (gtk_widget_get_parent(_backdrop.get()) == GTK_WIDGET(_overlay.get()))
         gtk_overlay_remove_overlay(_overlay.get(), _backdrop.get());
-    // The content takes its own widgets apart while they still stand in the layer.
+    // The content is destroyed first, while its widgets are still in the layer.
     _content.reset();
 }
 

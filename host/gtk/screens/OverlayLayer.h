@@ -14,16 +14,17 @@
 
 namespace host::gtk {
 
-/// Where a layer's content stands in the window.
+/// The place of a layer's content in the window.
 enum class LayerPlace {
     Center, ///< a card as large as its content
     Bottom, ///< a card along the lower edge
     Sheet, ///< a large card
-    Cover, ///< all of the window
+    Cover, ///< the whole window
 };
 
-/// A layer within the window itself: what lies below is dimmed and takes no input. It is no window of its
-/// own, because an alert must be able to refuse to close, which not every display server lets a window do.
+/// A layer within the window itself. The content below is dimmed and takes no input. It is not a window of
+/// its own, because an alert must be able to refuse to close, which not every display server lets a window
+/// do.
 class OverlayLayer : public PresentedLayer {
 public:
     /// `onOutside` is called when the user taps beside the content.

@@ -12,11 +12,11 @@
 
 namespace host::gtk {
 
-/// A layer in a popover that points at a place of the window.
+/// A layer in a popover that points at a place in the window.
 class PopoverLayer : public PresentedLayer {
 public:
-    /// `parent` is a widget that outlives the layer and lets a popover be its child; `onOutside` is called
-    /// when the user leaves the popover. It stands on `side` of the anchor.
+    /// `parent` is a widget that outlives the layer and can have a popover as its child. `onOutside` is
+    /// called when the user leaves the popover. The popover stands on `side` of the anchor.
     PopoverLayer(GtkWidget* parent, const GdkRectangle& anchor, GtkPositionType side,
         std::unique_ptr<LayerContent> content, std::function<void()> onOutside);
     ~PopoverLayer() override;

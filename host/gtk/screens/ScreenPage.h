@@ -17,9 +17,8 @@ class ViewController;
 
 namespace host::gtk {
 
-/// One screen of a navigation between its bars.
-class ScreenPage : public kit::ViewControllerObserver,
-                   public std::enable_shared_from_this<ScreenPage> {
+/// Shows one screen of a navigation controller between its bars.
+class ScreenPage : public kit::ViewControllerObserver, public std::enable_shared_from_this<ScreenPage> {
 public:
     static std::shared_ptr<ScreenPage> make(const std::shared_ptr<PeerContext>& context,
         const std::shared_ptr<kit::NavigationController>& navigation,
@@ -32,11 +31,11 @@ public:
     GtkWidget* widget() const { return _box.get(); }
     std::shared_ptr<kit::ViewController> screen() const { return _screen.lock(); }
     NavigationBarPeer& navigationBar() { return _navigationBar; }
-    ViewPeer* content() const { return _content.get(); } ///< null until the screen is shown first
+    ViewPeer* content() const { return _content.get(); } ///< null until the screen is first shown
 
     /// Loads the screen's view and shows it, once.
     void load();
-    /// Bars as the model has them, in the next frame.
+    /// Shows the model's bars in the next frame.
     void updateBars();
     void focus();
 

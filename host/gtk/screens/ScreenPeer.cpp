@@ -14,7 +14,7 @@ namespace host::gtk {
 
 namespace {
 
-/// The view of a screen at the size of its place.
+/// Shows a screen's view at the size of its place.
 class PlainScreenPeer : public ScreenPeer {
 public:
     PlainScreenPeer(const std::shared_ptr<PeerContext>& context, kit::ViewController& screen)
@@ -56,7 +56,10 @@ public:
     std::shared_ptr<ScreenPeer> peer;
 
 private:
-    void makePlain(kit::ViewController& screen) { peer = std::make_shared<PlainScreenPeer>(_context, screen); }
+    void makePlain(kit::ViewController& screen)
+    {
+        peer = std::make_shared<PlainScreenPeer>(_context, screen);
+    }
 
     const std::shared_ptr<PeerContext>& _context;
     WindowButtons _buttons;

@@ -15,10 +15,10 @@ namespace host::gtk {
 
 class ViewPeer;
 
-/// Whether the window's own buttons stand in the bars of a screen.
+/// Says whether the window's own buttons stand in a screen's bars.
 enum class WindowButtons { Shown, Hidden };
 
-/// Shows one screen of the kit, with everything that it contains. Sizes travel from the toolkit to the model:
+/// Shows one screen of the kit with the screens that it contains. Sizes travel from the toolkit to the model:
 /// the toolkit gives the screen its place, and the model lays itself out in it while that place is allocated.
 class ScreenPeer {
 public:
@@ -28,7 +28,7 @@ public:
     virtual void focus() = 0;
 };
 
-/// By the kind of screen: a navigation with its bars, or the view of the screen alone.
+/// Makes the peer for a screen's class: a navigation with its bars, or the view of the screen alone.
 std::shared_ptr<ScreenPeer> makeScreenPeer(const std::shared_ptr<PeerContext>& context,
     const std::shared_ptr<kit::ViewController>& screen, WindowButtons buttons);
 

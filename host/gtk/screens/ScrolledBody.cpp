@@ -43,7 +43,7 @@ void allocate(GtkWidget* bin, int width, int height, int baseline)
 GtkWidget* makeScrolledBody(GtkWidget* body)
 {
     auto* window = gtk_scrolled_window_new();
-    // The keyboard goes to what scrolls here, not to its frame.
+    // The body takes the keyboard focus, and its scrolled window does not.
     gtk_widget_set_focusable(window, FALSE);
     gtk_scrolled_window_set_policy(GTK_SCROLLED_WINDOW(window), GTK_POLICY_NEVER, GTK_POLICY_AUTOMATIC);
     gtk_scrolled_window_set_child(GTK_SCROLLED_WINDOW(window), body);

@@ -7,8 +7,8 @@
 
 namespace host::gtk {
 
-/// A widget around a body that is as high as the body's lines need in the width it gets, and scrolls the body
-/// where there is less room. The scrolled window alone asks for the height of lines that are not broken.
+/// Answers a widget around a body that is as high as the body's lines need in the given width, and scrolls
+/// the body where there is less room. A scrolled window alone would ask for the height of unbroken lines.
 GtkWidget* makeScrolledBody(GtkWidget* body);
 
 } // namespace host::gtk

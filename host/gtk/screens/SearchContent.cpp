@@ -79,7 +79,7 @@ void SearchContent::buildBar(const kit::SearchPresentation& search)
     _connections.push_back(connectSignal<void()>(_cancel, "clicked", cancel));
 }
 
-/// The results may come after the key that goes there.
+/// Handles the keys that lead to the results, which may arrive after the key.
 void SearchContent::connectKeys()
 {
     auto* keys = gtk_event_controller_key_new();

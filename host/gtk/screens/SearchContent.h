@@ -15,8 +15,8 @@ namespace host::gtk {
 /// A search field in a bar of its own, with the results below.
 class SearchContent : public LayerContent {
 public:
-    SearchContent(const std::shared_ptr<PeerContext>& context,
-        const std::shared_ptr<kit::SearchPresentation>& search);
+    SearchContent(
+        const std::shared_ptr<PeerContext>& context, const std::shared_ptr<kit::SearchPresentation>& search);
     ~SearchContent() override;
 
     GtkWidget* widget() const override { return _box.get(); }

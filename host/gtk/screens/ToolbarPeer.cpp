@@ -13,7 +13,8 @@ namespace {
 
 constexpr int itemDistance = 6;
 
-/// Whether a view without a width of its own is among the entries: it then gets what flexible spaces would.
+/// Answers whether an item has a view without a width of its own. Such a view takes the room of the flexible
+/// spaces.
 bool hasTakingView(const kit::BarButtonItems& items)
 {
     return std::ranges::any_of(items, [](const auto& item) {
@@ -28,7 +29,7 @@ ToolbarPeer::ToolbarPeer(std::shared_ptr<PeerContext> context)
     , _bar(ObjectRef<GtkWidget>::retain(gtk_revealer_new()))
     , _box(gtk_box_new(GTK_ORIENTATION_HORIZONTAL, itemDistance))
 {
-    // GtkActionBar keeps its three groups apart; here the entries share the whole width.
+    // A GtkActionBar would keep three groups apart, but here the items share the whole width.
     gtk_widget_set_hexpand(_box, TRUE);
     gtk_widget_add_css_class(_box, "kit-toolbar");
     gtk_revealer_set_transition_type(GTK_REVEALER(widget()), GTK_REVEALER_TRANSITION_TYPE_SLIDE_UP);

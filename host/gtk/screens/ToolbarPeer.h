@@ -16,7 +16,7 @@ public:
     ~ToolbarPeer();
 
     GtkWidget* widget() const { return _bar.get(); }
-    /// Shows these entries from now on; nothing happens when they are shown already.
+    /// Shows these items from now on, and does nothing when they are shown already.
     void show(const kit::BarButtonItems& items);
     void setHidden(bool hidden);
 

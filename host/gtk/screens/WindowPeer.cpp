@@ -16,7 +16,7 @@ using platform::Size;
 
 namespace {
 
-constexpr double lowWindow = 480; ///< points; lower is compact
+constexpr double lowWindow = 480; ///< points; a lower window has a compact height
 
 } // namespace
 
@@ -214,7 +214,8 @@ void WindowPeer::windowWillPresent(
     shown->focus();
 }
 
-/// Without a place to give it back to, nothing has it: not whatever comes first in the window.
+/// Gives the focus back to the widget that had it. When that widget is gone, nothing gets the focus, because
+/// the first widget of the window would be a surprise.
 void WindowPeer::giveFocusBack(GtkWidget* before) const
 {
     const bool isThere =
@@ -248,7 +249,7 @@ void WindowPeer::windowWillDismiss(
     });
 }
 
-/// The end comes out of one of the layer's own signals, so it lives until that is over.
+/// The layer is kept alive a little longer, because this is called from one of its own signals.
 void WindowPeer::layerHasGone(const std::shared_ptr<PresentedLayer>& layer)
 {
     std::erase(_leaving, layer);

@@ -19,17 +19,17 @@ namespace host::gtk {
 
 class PreviewModule;
 
-/// How large the window was when it was last open.
+/// The size of the window when it was last open.
 struct WindowSize {
     int width = 900, height = 700; ///< points
     bool isMaximized = false;
     bool operator==(const WindowSize&) const = default;
 };
 
-/// Shows the application's window: the root screen, and layers over it for what is presented.
+/// Shows the application's window: the root screen, and layers over it for presented screens.
 class WindowPeer : public kit::WindowObserver, public std::enable_shared_from_this<WindowPeer> {
 public:
-    /// `application` may be null: the window then stands for itself.
+    /// `application` may be null; the window then belongs to no application.
     static std::shared_ptr<WindowPeer> make(AdwApplication* application,
         const std::shared_ptr<kit::Window>& window, const WindowSize& size,
         const std::shared_ptr<PreviewModule>& previews);
@@ -39,24 +39,25 @@ public:
 
     void show();
     GtkWindow* window() const { return GTK_WINDOW(_window.get()); }
-    /// Where short messages show: over the root screen, below what is presented.
+    /// Answers the overlay for short messages, over the root screen and below presented screens.
     AdwToastOverlay* toasts() const { return _toasts; }
     const std::shared_ptr<PeerContext>& context() const { return _context; }
     ScreenPeer* rootPeer() const { return _root.get(); }
     std::shared_ptr<kit::Window> model() const { return _model.lock(); }
     WindowSize currentSize() const;
-    /// Called when the window becomes the one that the user works with, or no longer is it.
+    /// The callback runs when the window becomes or is no longer the active one.
     void setOnActive(std::function<void(bool)> callback) { _onActive = std::move(callback); }
-    /// Called before the window's screens disappear because the user closed it.
+    /// The callback runs before the window's screens disappear because the user closed it.
     void setOnClosed(std::function<void()> callback) { _onClosed = std::move(callback); }
 
-    static constexpr int minimumWidth = 360, minimumHeight = 294; ///< a phone with its keyboard up
+    static constexpr int minimumWidth = 360,
+                         minimumHeight = 294; ///< the size of a phone's screen above its keyboard
 
     void rootDidChange(kit::Window& window) override;
-    void windowWillPresent(kit::Window& window, const kit::Presentation& presentation,
-        kit::TransitionToken token) override;
-    void windowWillDismiss(kit::Window& window, const kit::Presentation& presentation,
-        kit::TransitionToken token) override;
+    void windowWillPresent(
+        kit::Window& window, const kit::Presentation& presentation, kit::TransitionToken token) override;
+    void windowWillDismiss(
+        kit::Window& window, const kit::Presentation& presentation, kit::TransitionToken token) override;
 
 private:
     struct Layer {

@@ -11,11 +11,11 @@ class ActivityIndicator;
 
 namespace host::gtk {
 
-/// A GtkSpinner.
+/// Shows an activity indicator with a GtkSpinner.
 class ActivityIndicatorPeer : public ViewPeer {
 public:
-    ActivityIndicatorPeer(std::shared_ptr<PeerContext> context,
-        const std::shared_ptr<kit::ActivityIndicator>& indicator);
+    ActivityIndicatorPeer(
+        std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ActivityIndicator>& indicator);
 
 protected:
     void mirror(kit::View& view, kit::ViewChanges changes) override;

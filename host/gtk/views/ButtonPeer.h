@@ -11,8 +11,8 @@ class Button;
 
 namespace host::gtk {
 
-/// A GtkButton. A button that is shown smaller than a finger still takes what touches 44 points around its
-/// centre.
+/// Shows a button with a GtkButton. A button that is smaller than a finger still takes touches within 44
+/// points around its centre.
 class ButtonPeer : public ViewPeer {
 public:
     ButtonPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::Button>& button);
@@ -27,7 +27,7 @@ private:
     GtkWidget *_icon, *_title;
 };
 
-/// A GtkButton with the touch area of a ButtonPeer.
+/// Makes a GtkButton with the touch area of a ButtonPeer.
 GtkWidget* makeTouchButton();
 
 } // namespace host::gtk

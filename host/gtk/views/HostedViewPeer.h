@@ -11,11 +11,10 @@ class HostedView;
 
 namespace host::gtk {
 
-/// The native view that the context's maker of the kind makes; without such a maker, empty space.
+/// Shows the native view that the context's maker for the kind makes. Without a maker it is empty space.
 class HostedViewPeer : public ViewPeer {
 public:
-    HostedViewPeer(
-        std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::HostedView>& hosted);
+    HostedViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::HostedView>& hosted);
 
 protected:
     void mirror(kit::View& view, kit::ViewChanges changes) override;

@@ -11,12 +11,11 @@ class ImageView;
 
 namespace host::gtk {
 
-/// A GtkPicture for pixels, a GtkImage for an icon of the theme, the peer's own drawing where pixels are
-/// enlarged without smoothing.
+/// Shows pixels with a GtkPicture and an icon of the theme with a GtkImage. Pixels that are enlarged without
+/// smoothing are drawn by the peer itself.
 class ImageViewPeer : public ViewPeer {
 public:
-    ImageViewPeer(
-        std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ImageView>& imageView);
+    ImageViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ImageView>& imageView);
 
     void canvasSnapshot(GtkSnapshot* snapshot) override;
 

@@ -10,7 +10,7 @@ namespace host::gtk {
 
 namespace {
 
-/// GTK's left end is where the text begins; the kit's Left is a side of the window.
+/// Answers GTK's alignment. Its left end is where the text begins; the kit's Left is a side of the window.
 float horizontalAlign(kit::TextAlignment alignment, bool rightToLeft)
 {
     switch (alignment) {

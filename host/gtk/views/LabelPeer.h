@@ -11,7 +11,8 @@ class Label;
 
 namespace host::gtk {
 
-/// A GtkLabel. A styled text with images is drawn by the peer, the label under it then only speaks.
+/// Shows a label with a GtkLabel. A styled text with images is drawn by the peer; the GtkLabel below then
+/// only serves assistive technology.
 class LabelPeer : public ViewPeer {
 public:
     LabelPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::Label>& label);
@@ -25,7 +26,7 @@ private:
     std::weak_ptr<kit::Label> _label;
 };
 
-/// Makes a GtkLabel show what a label of the kit shows.
+/// Makes a GtkLabel show the text of a label of the kit.
 void showLabel(GtkLabel* widget, const kit::Label& label, const Theme& theme);
 
 } // namespace host::gtk

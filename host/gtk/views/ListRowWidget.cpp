@@ -13,16 +13,16 @@
 namespace {
 
 constexpr int iconSize = 40, smallIconSize = 16;
-constexpr float markMargin = 8; ///< beside a check mark a finger still means it
+constexpr float markMargin = 8; ///< points beside a check mark in which a touch still counts
 constexpr int dotDiameter = 10, dotStep = 7; ///< dots of several tags overlap
 
-/// What a row may hold, from its leading edge to its trailing one.
+/// The parts of a row, from its leading edge to its trailing one.
 enum Part { Check, Icon, Texts, Dots, Download, Progress, Chevron, partCount };
 
 struct TrwListRow {
     GtkWidget parent;
     GtkListItem* item; ///< owns this widget
-    GtkWidget* parts[partCount]; ///< made when a row first needs them: 205 rows live beside the visible ones
+    GtkWidget* parts[partCount]; ///< made on first use, because 205 rows live beside the visible ones
     GtkWidget *title, *detail;
     kit::ListRow* shown;
     host::gtk::ListRowWidget::Handler* handler;
@@ -107,7 +107,7 @@ void trw_list_row_class_init(TrwListRowClass* type)
     gtk_widget_class_set_css_name(widget, "kit-row");
     gtk_widget_class_install_action(widget, "row.menu", nullptr, request);
     gtk_widget_class_install_action(widget, "row.peek", nullptr, request);
-    // The last one is the first that assistive technology sees, and performs by default.
+    // The last action is the first that assistive technology sees and the one that it performs by default.
     gtk_widget_class_install_action(widget, "row.activate", nullptr, activate);
 }
 
@@ -169,7 +169,7 @@ GtkWidget* makePart(TrwListRow* row, Part part)
     }
 }
 
-/// Puts a new part behind those that come before it.
+/// Inserts a new part behind the parts before it.
 void insert(TrwListRow* row, Part part, GtkWidget* made)
 {
     GtkWidget* before = nullptr;
@@ -182,7 +182,7 @@ void insert(TrwListRow* row, Part part, GtkWidget* made)
     row->parts[part] = made;
 }
 
-/// Shows or hides a part; null when it is not wanted and was never made.
+/// Shows or hides a part. Answers null when it is not wanted and was never made.
 GtkWidget* showPart(TrwListRow* row, Part part, bool wanted)
 {
     if (wanted && !row->parts[part])
@@ -195,7 +195,7 @@ GtkWidget* showPart(TrwListRow* row, Part part, bool wanted)
 void trw_list_row_init(TrwListRow* row)
 {
     row->shown = new kit::ListRow();
-    // A name of many combining marks is higher than any row.
+    // A name of many combining marks would be higher than the row, so it is clipped.
     gtk_widget_set_overflow(GTK_WIDGET(row), GTK_OVERFLOW_HIDDEN);
 }
 
@@ -249,7 +249,7 @@ void showAccessible(TrwListRow* row, const kit::ListRow& content)
     if (name.empty())
         name = content.detail.empty() ? content.title : content.title + ", " + content.detail;
     gtk_accessible_update_property(GTK_ACCESSIBLE(row), GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
-    // The place of the list that has the keyboard says it as well.
+    // The list item around the row, which has the keyboard focus, gets the same name.
     if (auto* place = gtk_widget_get_parent(GTK_WIDGET(row)))
         gtk_accessible_update_property(
             GTK_ACCESSIBLE(place), GTK_ACCESSIBLE_PROPERTY_LABEL, name.c_str(), -1);
@@ -258,7 +258,7 @@ void showAccessible(TrwListRow* row, const kit::ListRow& content)
     else
         gtk_accessible_update_state(GTK_ACCESSIBLE(row), GTK_ACCESSIBLE_STATE_PRESSED,
             content.check == kit::CheckState::On ? GTK_ACCESSIBLE_TRISTATE_TRUE
-                                                : GTK_ACCESSIBLE_TRISTATE_FALSE,
+                                                 : GTK_ACCESSIBLE_TRISTATE_FALSE,
             -1);
 }
 

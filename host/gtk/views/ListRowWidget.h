@@ -15,21 +15,21 @@ namespace host::gtk {
 /// "row.menu" and "row.peek".
 namespace ListRowWidget {
 
-/// What an action asks for at the row's present place.
+/// The actions that a row requests at its present place.
 enum class Request { Menu, Peek };
 using Handler = std::function<void(GtkWidget* row, Request request)>;
 
 GtkWidget* make(GtkListItem* item, Handler handler);
 bool isRow(GtkWidget* widget);
-/// Takes the room of a row that is shown later.
+/// Makes the widget take the room of a row that is shown later.
 void reserve(GtkWidget* row, double height);
-/// Shows a row; cheap when it is what the widget shows already.
+/// Shows a row. It is cheap when the widget shows the row already.
 void show(GtkWidget* row, const kit::ListRow& content, double height);
 const kit::ListRow& shown(GtkWidget* row);
 guint position(GtkWidget* row);
-/// Whether a point of the row, in its own coordinates, lies on the check mark or before it.
+/// Answers whether a point of the row, in its own coordinates, lies on the check mark or before it.
 bool isOnMark(GtkWidget* row, double x);
-/// The text of the title, as the label has it.
+/// Answers the text of the title's label.
 const char* titleText(GtkWidget* row);
 
 } // namespace ListRowWidget

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// What rows show: those that are seen at once, the others a few in each frame.
+// This file fills row widgets: visible rows at once, the others a few in each frame.
 
 #include "host/gtk/views/ListRowWidget.h"
 #include "host/gtk/views/ListViewPeer.h"
@@ -12,9 +12,10 @@ namespace host::gtk {
 
 namespace {
 
-/// How many rows that nobody sees are filled in one frame, so that a frame stays a frame.
+/// So many invisible rows are filled in one frame, so that the frame stays short.
 constexpr std::size_t rowsInAFrame = 6;
-/// Rows beside the seen ones that are filled with them: a layout that is a little late shows no empty row.
+/// So many rows beside the visible ones are filled with them, so that a layout that is a little late shows no
+/// empty row.
 constexpr std::size_t seenMargin = 2;
 
 bool isSeen(const kit::ListView& list, std::size_t row)
@@ -37,7 +38,7 @@ void ListViewPeer::bindRow(GtkListItem* item)
 void ListViewPeer::fillSoon(GtkListItem* item)
 {
     const auto list = _list.lock();
-    // Between two splices of one change a place is not that of the row.
+    // Between two splices of one change a row is not at its final place, so it is filled later.
     if (list && !_isSplicing && isSeen(*list, gtk_list_item_get_position(item))) {
         bindRow(item);
         context().firstList().note(_listWidget);
@@ -84,7 +85,7 @@ void ListViewPeer::fillSeenRows()
     }
 }
 
-/// The nearest first.
+/// Answers the unfilled rows, the one nearest to the visible rows first.
 std::vector<GtkListItem*> ListViewPeer::unfilledBesideSeen() const
 {
     std::vector<GtkListItem*> items(_unfilled.begin(), _unfilled.end());

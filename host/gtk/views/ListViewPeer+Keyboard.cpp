@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// What keys do in a list, beside those of the toolkit (arrows, Home, End, pages, return).
+// This file handles keys in a list, beside those of the toolkit (arrows, Home, End, pages, return).
 
 #include "host/gtk/base/MenuPopover.h"
 #include "host/gtk/views/ListRowWidget.h"
@@ -40,7 +40,7 @@ constexpr CommandKey commandKeys[] = {
     {GDK_KEY_space, noModifiers, kit::RowCommand::Peek},
 };
 
-/// Whether a key goes somewhere or does something, and so ends what is being typed.
+/// Answers whether a key moves or does something, and so ends the text that is being typed.
 bool endsTyping(guint key)
 {
     const bool isFunction =
@@ -92,7 +92,8 @@ bool ListViewPeer::keyPressed(guint key, GdkModifierType modifiers)
     return listKeyPressed(key, modifiers) || typedAhead(key, modifiers);
 }
 
-/// The toolkit goes along the rows by Tab as well, of which there may be a hundred thousand.
+/// Leaves the list by Tab. The toolkit would go along the rows instead, of which there may be a hundred
+/// thousand.
 bool ListViewPeer::leaveByTab(GtkDirectionType direction)
 {
     auto* root = gtk_widget_get_root(_listWidget);

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// What fingers do in a list, beside the scrolling and tapping of the toolkit.
+// This file handles touches in a list, beside the scrolling and tapping of the toolkit.
 
 #include "host/gtk/views/ListRowWidget.h"
 #include "host/gtk/views/ListViewPeer.h"
@@ -15,14 +15,15 @@ using platform::Point;
 
 namespace {
 
-constexpr double markDragStart = 8; ///< points; a finger that only taps moves less
-constexpr double strayed = 24; ///< points; a finger that went so far meant no row
-constexpr platform::Duration pressOn = std::chrono::milliseconds(1200); ///< after the row was held
+constexpr double markDragStart = 8; ///< points; a tap moves less
+constexpr double strayed = 24; ///< points; a touch that moved so far opens no row
+constexpr platform::Duration pressOn =
+    std::chrono::milliseconds(1200); ///< after the row was recognised as held
 
 } // namespace
 
-/// A finger that leaves the place where it came down opens nothing there, even where nothing follows it, nor
-/// do two at once.
+/// Keeps a touch that leaves its starting place from opening a row, even when no gesture follows it, and two
+/// touches at once as well.
 void ListViewPeer::connectStrayingFinger()
 {
     auto* events = gtk_event_controller_legacy_new();
@@ -52,16 +53,18 @@ void ListViewPeer::followFinger(GdkEvent* event)
     const bool isAway = std::hypot(place.x - _fingerStart.x, place.y - _fingerStart.y) >= strayed;
     _hasStrayed |= _fingers > 1 || (isFirst && isAway);
     const bool hasLeft = type == GDK_TOUCH_END || type == GDK_TOUCH_CANCEL;
-    // The row hears of the end after this, and a key may activate it later.
+    // The flag is reset in the next frame, because the row receives the end of the touch after this, and a
+    // key may activate the row later.
     if (hasLeft && --_fingers <= 0)
         context().scheduler().scheduleNextFrame(&_hasStrayed, [this] { _hasStrayed = false; });
 }
 
-/// To draw along the check marks selects or deselects all rows on the way.
+/// Dragging along the check marks selects or deselects all rows on the way.
 void ListViewPeer::connectMarks()
 {
     auto* drag = gtk_gesture_drag_new();
-    // Around what scrolls, which would take the finger.
+    // The gesture is on the widget around the scrolled window, because the scrolled window would take the
+    // touch.
     gtk_event_controller_set_propagation_phase(GTK_EVENT_CONTROLLER(drag), GTK_PHASE_CAPTURE);
     gtk_widget_add_controller(native(), GTK_EVENT_CONTROLLER(drag));
     connect(connectSignal<void(double, double)>(drag, "drag-begin", [this, drag](double x, double y) {
@@ -85,7 +88,8 @@ void ListViewPeer::connectMarks()
     }));
 }
 
-/// A list that has nothing to scroll does not follow a finger by itself, and could not be pulled.
+/// Makes a list follow a finger even when all rows are visible. The toolkit would not, and the list could not
+/// be pulled to refresh.
 void ListViewPeer::followFingerEvenIfAllIsSeen()
 {
     auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
@@ -103,7 +107,7 @@ void ListViewPeer::held(GtkWidget* row, double x, double y)
         showMenuOf(row, x, y);
 }
 
-/// A finger that stays on after what it held shows itself presses on.
+/// Opens the held row when the finger stays on it after its preview appeared.
 void ListViewPeer::waitForPressOn()
 {
     auto& dispatch = platform::services().dispatch();

@@ -15,17 +15,17 @@ using platform::Point;
 
 namespace {
 
-/// The toolkit keeps about this many rows as widgets, whatever the screen shows; more rows cost nothing.
+/// The toolkit keeps about so many rows as widgets, whatever the screen shows. Further rows cost nothing.
 constexpr std::size_t livingRows = 220;
-/// How many of them are made in one frame, so that a frame stays a frame. The first frame has a page to lay
-/// out as well.
+/// So many rows are made in one frame, so that the frame stays short. The first frame also lays out the page.
 constexpr std::size_t firstRows = 6, moreRows = 6;
-/// The widgets take so many single changes at once; more are told in one away from what is seen.
+/// The widgets take up to so many single changes at once. More changes are merged into one on either side of
+/// the visible rows.
 constexpr std::size_t mostSplices = 16;
 constexpr double textMargin =
-    10; ///< points above and below a row's texts, half the distance between them included
-constexpr int layoutFrames = 2; ///< after so many frames new rows have their heights
-constexpr int focusFrames = 4; ///< a row that was scrolled to has its widget after one or two
+    10; ///< points above and below a row's texts, with half the distance between them
+constexpr int layoutFrames = 2; ///< new rows have their heights after so many frames
+constexpr int focusFrames = 4; ///< a row that was scrolled to has its widget after one or two frames
 
 template <typename Observer, typename Peer>
 std::shared_ptr<Observer> observing(Peer& peer)
@@ -33,7 +33,8 @@ std::shared_ptr<Observer> observing(Peer& peer)
     return std::shared_ptr<Observer>(peer.shared_from_this(), static_cast<Observer*>(&peer));
 }
 
-/// What two lines of text and the margins around them need, which with large text is more than the usual.
+/// Answers the height of two lines of text and the margins around them, which is larger than usual with large
+/// text.
 double rowHeightForTexts()
 {
     const double lines = kit::Font::preferred(kit::TextStyle::Body).lineHeight()
@@ -41,8 +42,8 @@ double rowHeightForTexts()
     return std::max(kit::ListView::defaultRowHeight, std::ceil(lines + 2 * textMargin));
 }
 
-/// A menu takes the pointer, so that the toolkit never sees the end of the press that opened it: the row
-/// would look pressed until the next one.
+/// Clears the pressed look of a row. A menu takes the pointer, so the toolkit never sees the end of the press
+/// that opened it, and the row would look pressed until the next press.
 void endPress(GtkWidget* pressed)
 {
     for (auto* widget = pressed; widget; widget = gtk_widget_get_parent(widget))
@@ -57,7 +58,7 @@ std::size_t rowCountBefore(const kit::ListView& list, const kit::ListChanges& ch
     return count;
 }
 
-/// Whether a row that stayed shows something else.
+/// Answers whether a row that stayed shows something else.
 bool showsAnew(const kit::ListChanges& changes, std::size_t row)
 {
     const auto after = std::ranges::upper_bound(
@@ -65,8 +66,8 @@ bool showsAnew(const kit::ListChanges& changes, std::size_t row)
     return after != changes.changed.begin() && std::prev(after)->contains(row);
 }
 
-/// Few enough splices that leave the rows with widgets alone, or at least those that are seen: a row that
-/// goes and comes again has to be filled again.
+/// Answers few splices that leave the rows with widgets alone, or at least the visible ones, because a row
+/// that is removed and inserted again has to be filled again.
 std::vector<kit::ListSplice> splicesToTell(const kit::RowRange& visible, const kit::ListChanges& changes)
 {
     if (changes.splices.size() <= mostSplices)
@@ -97,7 +98,7 @@ ListViewPeer::~ListViewPeer()
     context().scheduler().cancel(&_onScroll);
     context().scheduler().cancel(&_hasStrayed);
     _onScroll.disconnect();
-    // The list ends now, while its rows' handlers are still connected to this.
+    // The list is emptied now, while its rows' handlers are still connected to this.
     gtk_list_view_set_model(GTK_LIST_VIEW(_listWidget), nullptr);
     gtk_list_view_set_factory(GTK_LIST_VIEW(_listWidget), nullptr);
 }
@@ -111,7 +112,7 @@ void ListViewPeer::buildWidgets()
     gtk_list_view_set_single_click_activate(GTK_LIST_VIEW(_listWidget), TRUE);
     gtk_widget_add_css_class(_listWidget, "kit-list");
     _window = gtk_scrolled_window_new();
-    // The keyboard goes to what scrolls here, not to its frame.
+    // The list takes the keyboard focus, and its scrolled window does not.
     gtk_widget_set_focusable(_window, FALSE);
     gtk_scrolled_window_set_policy(GTK_SCROLLED_WINDOW(_window), GTK_POLICY_NEVER, GTK_POLICY_AUTOMATIC);
     gtk_scrolled_window_set_child(GTK_SCROLLED_WINDOW(_window), _listWidget);
@@ -149,7 +150,7 @@ void ListViewPeer::connectInput()
     auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
     _onScroll = connectSignal<void()>(adjustment, "value-changed", [this] { scrolled(); });
     connect(connectSignal<void()>(adjustment, "changed", [this] {
-        // Not now: the list is being laid out.
+        // This runs in the next frame, because the list is being laid out now.
         context().scheduler().scheduleNextFrame(&_onScroll, [this] { followFingerEvenIfAllIsSeen(); });
     }));
     connect(connectSignal<void(GtkPositionType)>(_window, "edge-overshot", [this](GtkPositionType edge) {
@@ -158,7 +159,7 @@ void ListViewPeer::connectInput()
             list->pulledToRefresh();
     }));
     auto* keys = gtk_event_controller_key_new();
-    // Before the list's own keys, of which some mean something else here.
+    // These keys come before the list's own ones, because some of those mean something else here.
     gtk_event_controller_set_propagation_phase(keys, GTK_PHASE_CAPTURE);
     gtk_widget_add_controller(_listWidget, keys);
     connect(connectSignal<gboolean(guint, guint, GdkModifierType)>(
@@ -240,12 +241,13 @@ void ListViewPeer::scrolled()
 
 void ListViewPeer::showMenuOf(GtkWidget* row, double x, double y)
 {
-    // A row that gets the keyboard back now would take it from the menu, and so close it.
+    // A row that got the keyboard focus now would take it from the menu and so close the menu.
     context().scheduler().cancel(&_focusKey);
     const auto list = _list.lock();
     if (!list)
         return;
-    // On the list rather than on the row, whose widget may be given to another row while the menu is open.
+    // The menu belongs to the list and not to the row, whose widget may show another row while the menu is
+    // open.
     double listX = x, listY = y;
     gtk_widget_translate_coordinates(row, widget(), x, y, &listX, &listY);
     endPress(row);
@@ -286,7 +288,7 @@ void ListViewPeer::showRows(std::size_t count)
     const std::size_t known = g_list_model_get_n_items(_rows.get());
     if (known == count)
         return;
-    // A list that is far enough is complete at once; one that begins grows into its rows.
+    // A list with enough rows is complete at once. A new list grows by a few rows in each frame.
     const auto next =
         known >= livingRows || count <= firstRows ? count : std::min(count, std::max(known, firstRows));
     const auto kept = std::min(known, next);
@@ -323,13 +325,13 @@ void ListViewPeer::rowsDidChange(kit::ListView& list, const kit::ListChanges& ch
 {
     auto* focused = focusedRow();
     const auto focusedAt = focused ? std::optional(ListRowWidget::position(focused)) : std::nullopt;
-    // A list that still grows shows its beginning only: its rows are read anew instead.
+    // A list that still grows has only its beginning in the widgets, so those rows are filled again instead.
     if (g_list_model_get_n_items(_rows.get()) == rowCountBefore(list, changes))
         splice(list, changes);
     else
         fillAllSoon();
     showRows(list.rowCount());
-    // The row that had the keyboard is gone: the one that came to its place has it now.
+    // The row that had the keyboard focus is gone, so the row in its place gets it.
     if (focusedAt && !focusedRow() && list.rowCount() > 0)
         focusSoon(std::min<std::size_t>(*focusedAt, list.rowCount() - 1), focusFrames);
 }
@@ -351,7 +353,7 @@ void ListViewPeer::splice(const kit::ListView& list, const kit::ListChanges& cha
         fillLater();
 }
 
-/// The objects of the rows in a range that have widgets.
+/// Answers the objects of the rows in a range that have widgets.
 std::vector<ObjectRef<GObject>> ListViewPeer::rowObjects(const kit::RowRange& range) const
 {
     std::vector<ObjectRef<GObject>> objects;
@@ -392,7 +394,8 @@ void ListViewPeer::moveTo(double value, int frames)
         gtk_adjustment_set_value(adjustment, value);
         return;
     }
-    // The widgets have no height for rows that they have not laid out yet, nor a place among them.
+    // The widgets have no height and no place for rows that they have not laid out yet, so the move takes a
+    // second step.
     RowModel::complete(_rows.get(), static_cast<guint>(list->rowCount()));
     context().scheduler().scheduleNextFrame(
         &_scrollKey, [this, value, frames] { moveTo(value, frames - 1); });

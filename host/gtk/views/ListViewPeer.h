@@ -12,15 +12,16 @@
 
 namespace host::gtk {
 
-/// Shows a list by a GtkListView over a lazy model: only rows near the visible ones have widgets. Of many
-/// changes at once only those near the visible rows are told to the toolkit one by one
+/// Shows a list with a GtkListView over a lazy model. Only rows near the visible ones have widgets. Of many
+/// changes at once the toolkit is told only those near the visible rows one by one
 /// (ListChanges::splicesExactWithin). A place among rows that were never laid out is reached once they have
 /// heights.
 ///
 /// Keys (ListViewPeer+Keyboard.cpp): F2, Delete and Alt+Return act on a row, Space peeks at it, Menu and
 /// Shift+F10 open its menu, Ctrl+A and Shift with the arrows select, letters type ahead, Tab leaves the list.
-/// Fingers (ListViewPeer+Touch.cpp): along the check marks they select a range, on a row they hold and then
-/// press on; one that goes astray opens nothing, and a list that is seen as a whole can be pulled.
+/// Touches (ListViewPeer+Touch.cpp): a drag along the check marks selects a range. A finger that is held on a
+/// row shows its preview, and opens it when it stays. A finger that leaves its place opens nothing, and a
+/// list whose rows are all visible can be pulled.
 class ListViewPeer : public ViewPeer, public kit::ScrollObserver, public kit::ListViewObserver {
 public:
     ListViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ListView>& list);
@@ -39,7 +40,7 @@ public:
 
     bool grabFocus() override;
     GtkWidget* listWidget() const { return _listWidget; }
-    /// The widgets of the rows that exist now, in no order.
+    /// Answers the widgets of the rows that exist now, in no order.
     std::vector<GtkWidget*> liveRows() const;
 
 protected:
@@ -60,14 +61,14 @@ private:
     void activated(guint position);
     void scrolled();
     void followFingerEvenIfAllIsSeen();
-    /// Lets the widgets know of as many rows as a frame can make widgets for, and of more in the next frames.
+    /// Tells the widgets of as many rows as can be made in a frame, and of more in the next frames.
     void showRows(std::size_t count);
     void growRows();
     std::vector<ObjectRef<GObject>> rowObjects(const kit::RowRange& range) const;
     void splice(const kit::ListView& list, const kit::ListChanges& changes);
-    /// Scrolls, at the latest after so many frames.
+    /// Scrolls to a height, at the latest after so many frames.
     void moveTo(double value, int frames);
-    /// Rows that are seen are filled at once, those beside them a few in each frame.
+    /// Visible rows are filled at once, and those beside them a few in each frame.
     void fillSoon(GtkListItem* item);
     void fillAllSoon();
     void fillLater();
@@ -79,7 +80,7 @@ private:
     void held(GtkWidget* row, double x, double y);
     void waitForPressOn();
 
-    // The keyboard.
+    // These handle the keyboard.
     bool keyPressed(guint key, GdkModifierType modifiers);
     bool leaveByTab(GtkDirectionType direction);
     bool rowKeyPressed(std::size_t row, guint key, GdkModifierType modifiers);
@@ -89,20 +90,20 @@ private:
     bool isShiftHeld() const;
     GtkWidget* focusedRow() const;
     GtkWidget* rowAt(double x, double y) const;
-    /// Gives the keyboard to a row as soon as it has a widget.
+    /// Gives the keyboard focus to a row as soon as it has a widget.
     void focusSoon(std::size_t index, int frames);
 
     std::weak_ptr<kit::ListView> _list;
     ObjectRef<GListModel> _rows;
     GtkWidget *_listWidget = nullptr, *_window = nullptr, *_refresher = nullptr, *_spinner = nullptr;
     std::unordered_set<GtkListItem*> _live;
-    std::unordered_set<GtkListItem*> _unfilled; ///< of those, the ones that do not show their rows yet
+    std::unordered_set<GtkListItem*> _unfilled; ///< the live rows that do not show their content yet
     bool _isSplicing = false; ///< rows are not at their final places
     SignalConnection _onScroll;
     kit::TypeAhead _typeAhead;
-    platform::Point _fingerStart; ///< where the first came down
-    int _fingers = 0; ///< that are down
-    bool _hasStrayed = false; ///< they open no row
+    platform::Point _fingerStart; ///< the place where the first finger touched
+    int _fingers = 0; ///< the number of fingers on the list
+    bool _hasStrayed = false; ///< the present touch opens no row
     int _holds = 0; ///< counts the fingers that held a row, so that an earlier one does not press on
     int _focusKey = 0; ///< its address names the focusing of a row in the scheduler
     int _scrollKey = 0; ///< its address names the second step of a scrolling in the scheduler

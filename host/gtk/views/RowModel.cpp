@@ -9,7 +9,7 @@ struct TrwRowModel {
     GObject parent;
     guint count;
     std::span<const host::gtk::ObjectRef<GObject>>
-        leaving; ///< items that may stand for rows that come; only during a splice
+        leaving; ///< objects that inserted rows may take over; only during a splice
 };
 
 struct TrwRowModelClass {

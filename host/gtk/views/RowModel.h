@@ -11,18 +11,18 @@
 
 namespace host::gtk {
 
-/// The rows of a list as the toolkit wants them: a count, and an empty object for each row that is looked at.
+/// The rows of a list as a GListModel: a count, and an empty object for each row that is asked for.
 namespace RowModel {
 
 ObjectRef<GListModel> make();
-/// Tells the widgets which rows went and came. `position` and `removed` are of the rows as they were.
-/// `leaving` are objects of rows that go, which live until the call ends: rows that come get them, and with
-/// them the widgets, which would cost much more to make than to fill anew.
+/// Tells the widgets which rows were removed and inserted. `position` and `removed` are indexes in the old
+/// rows. `leaving` are objects of removed rows, which live until the call ends. Inserted rows get them, and
+/// with them their widgets, because filling a widget is much cheaper than making one.
 void splice(GListModel* model, guint position, guint removed, guint inserted,
     std::span<const ObjectRef<GObject>> leaving = {});
-/// Adds the rows that the widgets do not know of yet, at the end.
+/// Appends the rows that the widgets do not know of yet.
 void complete(GListModel* model, guint count);
-/// Other rows, whatever they were before.
+/// Replaces all rows.
 void reset(GListModel* model, guint count);
 
 } // namespace RowModel

@@ -7,7 +7,7 @@ namespace host::gtk {
 using platform::Point;
 using platform::Size;
 
-/// The canvas inside the scrolled window: as large as the content with its insets.
+/// The canvas inside the scrolled window, which is as large as the content with its insets.
 class ScrollViewPeer::Content : public CanvasClient {
 public:
     explicit Content(ScrollViewPeer& peer)
@@ -44,7 +44,7 @@ ScrollViewPeer::ScrollViewPeer(
 {
     CanvasWidget::setClient(_content.get(), _contentClient.get());
     auto* window = gtk_scrolled_window_new();
-    // The keyboard goes to what scrolls here, not to its frame.
+    // The content takes the keyboard focus, and its scrolled window does not.
     gtk_widget_set_focusable(window, FALSE);
     gtk_scrolled_window_set_child(GTK_SCROLLED_WINDOW(window), _content.get());
     setNative(window);
@@ -95,7 +95,7 @@ void ScrollViewPeer::mirror(kit::View& shown, kit::ViewChanges changes)
     const auto view = _scrollView.lock();
     if (!view)
         return;
-    // The widget scrolls by itself: a new origin of the bounds moves no child.
+    // The widget scrolls by itself, so a new origin of the bounds moves no child.
     ViewPeer::mirror(shown, changes);
     if (changes.contains(kit::ViewChange::IntrinsicSize)) {
         mirrorBehavior(*view);

@@ -8,11 +8,10 @@
 
 namespace host::gtk {
 
-/// A GtkScrolledWindow around a canvas of the content's size.
+/// Shows a scroll view with a GtkScrolledWindow around a canvas of the content's size.
 class ScrollViewPeer : public ViewPeer, public kit::ScrollObserver {
 public:
-    ScrollViewPeer(
-        std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ScrollView>& scrollView);
+    ScrollViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ScrollView>& scrollView);
     ~ScrollViewPeer() override;
 
     void scrollTo(kit::ScrollView& view, platform::Point offset, bool animated) override;

@@ -82,7 +82,8 @@ void TextFieldPeer::selectionMoved()
 {
     const auto field = _field.lock();
     auto* editable = GTK_EDITABLE(native());
-    // While an edit goes on, the entry moves its caret before it tells of the new text.
+    // During an edit the entry moves its caret before it reports the new text, so the selection counts only
+    // when the texts agree.
     if (field && field->text() == gtk_editable_get_text(editable))
         field->userSelected(selectionOf(editable));
 }

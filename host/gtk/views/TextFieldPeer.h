@@ -11,18 +11,17 @@ class TextField;
 
 namespace host::gtk {
 
-/// A GtkEntry.
+/// Shows a text field with a GtkEntry.
 class TextFieldPeer : public ViewPeer {
 public:
-    TextFieldPeer(
-        std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::TextField>& field);
+    TextFieldPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::TextField>& field);
 
     bool grabFocus() override;
-    /// The entry's own height: the theme wants more room around a text than a line of it.
+    /// Answers the entry's own height, because the theme wants more room around a text than its line has.
     std::optional<platform::Size> nativeSize(const kit::View& view, double maxWidth) override;
-    /// What the entry is called where neither its label nor its placeholder says so.
+    /// Sets the entry's accessible name when neither its label nor its placeholder gives one.
     void setAccessibleName(const std::string& name);
-    /// Called when the return key was pressed and the field's delegate did not object.
+    /// The callback runs when the return key was pressed and the field's delegate did not object.
     void setOnReturn(std::function<void()> callback) { _onReturn = std::move(callback); }
 
 protected:
