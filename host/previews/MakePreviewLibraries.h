@@ -5,5 +5,5 @@
 
 #include "host/gtk/preview/PreviewLibraries.h"
 
-/// The one function of the module, found by this name (`host::gtk::makePreviewLibrariesName`).
+/// The module's one function, which is found by this name (`host::gtk::makePreviewLibrariesName`).
 extern "C" void trwMakePreviewLibraries(std::shared_ptr<host::gtk::PreviewLibraries>& made);

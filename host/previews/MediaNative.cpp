@@ -23,7 +23,7 @@ void name(GtkWidget* control, const std::string& text)
     gtk_accessible_update_property(GTK_ACCESSIBLE(control), GTK_ACCESSIBLE_PROPERTY_LABEL, text.c_str(), -1);
 }
 
-/// The toolkit gives its player's controls icons, but no words.
+/// Names the player's controls, because the toolkit gives them icons but no accessible names.
 void nameControls(GtkWidget* player, const std::string& button)
 {
     for (auto* child = gtk_widget_get_first_child(player); child;

@@ -8,7 +8,7 @@
 
 namespace host::previews {
 
-/// Plays sound and films in the toolkit's player.
+/// Plays sounds and films in the toolkit's player.
 class MediaNative : public gtk::PreviewNative {
 public:
     explicit MediaNative(const std::shared_ptr<screens::PreviewMediaView>& view);
@@ -33,7 +33,7 @@ private:
     gtk::ObjectRef<GtkWidget> _box;
     gtk::ObjectRef<GtkMediaStream> _stream;
     GtkWidget* _player = nullptr; ///< in the box
-    unsigned _generation = 0; ///< of the content; an answer for an older one is ignored
+    unsigned _generation = 0; ///< number of the content; an answer for an older one is ignored
     gtk::SignalConnections _connections, _streamConnections;
 };
 

@@ -17,7 +17,8 @@ namespace host::previews::MediaSupport {
 
 namespace {
 
-/// The toolkit's player ends the process when this part is missing.
+/// Answers whether the player's parts exist. The toolkit's player aborts the process when this part is
+/// missing.
 bool hasPlayer()
 {
     if (!gst_init_check(nullptr, nullptr, nullptr))
@@ -28,7 +29,8 @@ bool hasPlayer()
     return factory != nullptr;
 }
 
-/// Without its module the toolkit has a stand-in that plays nothing.
+/// Answers whether the toolkit's media module is installed. Without it the toolkit uses a stand-in that plays
+/// nothing.
 bool hasToolkitModule()
 {
     auto* extensions = g_io_extension_point_lookup("gtk-media-file");

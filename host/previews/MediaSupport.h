@@ -8,14 +8,15 @@
 
 namespace host::previews {
 
-/// Whether this machine can play sound and films.
+/// Finds out whether this machine can play sounds and films.
 namespace MediaSupport {
 
-/// Looks for the player's parts, off the main thread (the first time, a registry of plug-ins is read); the
-/// answer comes on the main queue: empty when all is there, else what is missing, in words. Main thread.
+/// Looks for the player's parts off the main thread, because the first look reads a registry of plug-ins. The
+/// answer comes on the main queue: an empty text when all parts are there, else a sentence that names what is
+/// missing. Main thread.
 void check(std::function<void(const std::string& missing)> answer);
 
-/// Why a stream could not be played, for the person.
+/// Answers a sentence that tells the user why a stream could not be played.
 std::string wordsFor(const char* domain, int code);
 
 } // namespace MediaSupport

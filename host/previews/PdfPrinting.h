@@ -7,7 +7,8 @@
 
 namespace host::previews {
 
-/// Reads a PDF document to be printed. Any thread; may take long. Errors: why it cannot be, in words.
+/// Reads a PDF document to be printed. It may take long; any thread. The error says in a sentence why it
+/// cannot be printed.
 platform::Result<std::shared_ptr<gtk::PrintablePages>> readPrintablePdf(const std::string& path);
 
 } // namespace host::previews

@@ -27,7 +27,7 @@ std::optional<Error> checkFile(const std::string& path)
     struct stat status { };
     if (::stat(path.c_str(), &status) != 0)
         return errno == ENOENT ? Error(platform::FileErrorCode::NoSuchFile) : systemError(errno, path);
-    // Anything but a regular file could keep the reader waiting.
+    // Only a regular file is opened, because reading a pipe or a device could block for ever.
     if (!S_ISREG(status.st_mode))
         return pagesError(PagesErrorCode::Damaged);
     if (::access(path.c_str(), R_OK) != 0)

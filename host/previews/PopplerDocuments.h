@@ -7,7 +7,7 @@
 
 namespace host::previews {
 
-/// Opens PDF documents with Poppler. A page is drawn by the thread that asks, so ask on a worker.
+/// Opens PDF documents with Poppler. A page is drawn on the calling thread, so call it on a worker.
 class PopplerDocuments : public platform::PagedDocumentOpener {
 public:
     platform::Result<std::shared_ptr<platform::PagedDocument>> open(const std::string& path) const override;

@@ -35,7 +35,7 @@ constexpr PopplerColor highlightColor{0xFFFF, 0xE000, 0x4000};
 constexpr PopplerColor underlineColor{0xE000, 0x2000, 0x2000};
 constexpr PopplerColor noteColor{0xFFFF, 0xD800, 0x2000};
 
-/// Identifiers of new marks begin here, beyond the places of those that a page comes with.
+/// New marks get identifiers from here on, which are larger than the indexes of the marks in the document.
 constexpr std::uint32_t firstNewMark = 1 << 24;
 
 Result<Object<PopplerDocument>> openBytes(const std::shared_ptr<const std::string>& bytes)
@@ -62,17 +62,17 @@ bool isIndexAt(std::string_view bytes, std::size_t offset)
     const auto first = there.find_first_not_of(" \r\n\t");
     if (first == std::string_view::npos)
         return false;
-    // An index is a table, or an object that holds one.
+    // A cross-reference index is a table, or an object that holds one.
     return there.substr(first).starts_with("xref")
         || (there[first] >= '0' && there[first] <= '9' && there.find(" obj") != std::string_view::npos);
 }
 
-/// Whether the document's own index can be found. One that had to be made anew is no ground for changes: what
-/// is appended to it refers to what is not there.
+/// Answers whether the document's own cross-reference index can be found. A document whose index the library
+/// had to rebuild is not changed, because appended changes would refer to objects that are not there.
 bool hasIndex(std::string_view bytes)
 {
     constexpr std::string_view keyword = "startxref";
-    constexpr std::size_t searched = 1024; // of the end, as all readers do
+    constexpr std::size_t searched = 1024; // bytes at the end that all readers search
     const auto end = bytes.size() > searched ? bytes.substr(bytes.size() - searched) : bytes;
     const auto at = end.rfind(keyword);
     if (at == std::string_view::npos)
@@ -82,7 +82,7 @@ bool hasIndex(std::string_view bytes)
     std::size_t offset = 0;
     if (std::from_chars(number.data(), number.data() + number.size(), offset).ec != std::errc())
         return false;
-    // Offsets count from the header, before which there may be something.
+    // Offsets count from the header, which may have other bytes before it.
     const auto header = bytes.substr(0, searched).find("%PDF-");
     return isIndexAt(bytes, offset)
         || (header != std::string_view::npos && isIndexAt(bytes, offset + header));
@@ -151,7 +151,7 @@ bool isFormEdit(const PageEdit& edit)
         || std::holds_alternative<platform::FieldChoiceEdit>(edit);
 }
 
-/// What the library writes into a file, which tells nothing of a full disk: so that file lies in memory.
+/// Answers the bytes that the library writes. It writes into memory, because it does not report a full disk.
 Result<std::string> bytesOf(PopplerDocument& document)
 {
     const FileDescriptor file(::memfd_create("pages", MFD_CLOEXEC));
@@ -181,7 +181,7 @@ std::vector<FormField> fieldsOn(const PopplerPages& pages, std::size_t index)
     });
 }
 
-/// Whether two states of a document hold the same on a page, as far as edits change it.
+/// Answers whether two states of a document have the same content on a page, as far as edits can change it.
 bool isSamePage(const PopplerPages& a, const PopplerPages& b, std::size_t page)
 {
     const auto isSameField = [](const FormField& one, const FormField& other) {
@@ -197,7 +197,7 @@ bool isSamePage(const PopplerPages& a, const PopplerPages& b, std::size_t page)
 
 } // namespace
 
-/// The pages with the edits, whose marks keep their identifiers while others come and go.
+/// The pages with the edits. A mark keeps its identifier while others come and go.
 class PopplerEditing::Pages : public PopplerPages {
 public:
     using PopplerPages::PopplerPages;
@@ -219,7 +219,7 @@ public:
         return withDocument([&](PopplerDocument& document) { return applyTo(document, edit); });
     }
 
-    /// Puts a fresh document with these edits in place of the one before.
+    /// Replaces the document by a newly read one with these edits.
     void restart(Object<PopplerDocument> document, const std::vector<PageEdit>& edits)
     {
         setDocument(std::move(document));

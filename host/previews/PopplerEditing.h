@@ -10,10 +10,10 @@
 
 namespace host::previews {
 
-/// Changes a PDF document with Poppler. An edit is taken back by reading the document anew and applying all
-/// the others again, so that nothing of what other programs have put into it is lost on the way. A document
-/// whose own index cannot be found is not changed at all. What the library writes goes to memory first,
-/// because the library does not tell of a full disk. It makes no drawings by hand (ink), so there are none.
+/// Changes a PDF document with Poppler. An edit is undone by reading the document again and applying all
+/// other edits, so that content that other programs have added is never lost. A document whose own index
+/// cannot be found is not changed at all. The library writes into memory first, because it does not report a
+/// full disk. It cannot make drawings by hand (ink), so there are none.
 class PopplerEditing : public platform::PagedDocumentEditing {
 public:
     static platform::Result<std::shared_ptr<platform::PagedDocumentEditing>> open(
@@ -32,7 +32,7 @@ public:
 private:
     std::shared_ptr<const std::string> _bytes;
     std::shared_ptr<Pages> _pages;
-    mutable std::mutex _mutex; ///< of the edits: one is made at a time
+    mutable std::mutex _mutex; ///< guards the edits, which are made one at a time
     std::vector<platform::PageEdit> _edits;
 };
 

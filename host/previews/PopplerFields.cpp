@@ -18,7 +18,8 @@ struct FoundField {
     Object<PopplerFormField> handle;
 };
 
-/// Where the fields lie that nobody sees: the library tells so only of what draws them.
+/// Answers the rectangles of hidden fields. They are found by their widget annotations, because the library
+/// does not say it of a field itself.
 std::vector<Rect> hiddenPlaces(PopplerPage* page)
 {
     constexpr unsigned unseen = POPPLER_ANNOT_FLAG_HIDDEN | POPPLER_ANNOT_FLAG_NO_VIEW;
@@ -71,7 +72,7 @@ void readChoice(PopplerFormField* handle, FormField& field)
         field.text = takenText(poppler_form_field_choice_get_text(handle));
 }
 
-/// False for what no person fills in.
+/// Answers false for a field that no user fills in.
 bool read(PopplerFormField* handle, FormField& field)
 {
     if (poppler_form_field_is_read_only(handle) != FALSE)
@@ -112,7 +113,7 @@ std::vector<FoundField> foundFields(PopplerPage* page)
         fields.push_back(std::move(found));
     }
     poppler_page_free_form_field_mapping(list);
-    // The library answers the last one first.
+    // The library answers the fields in reverse order.
     std::ranges::reverse(fields);
     return fields;
 }

@@ -10,10 +10,11 @@
 
 namespace host::previews {
 
-/// The fields of a page that a person may fill in, in the order of the form.
+/// Answers the fields of a page that a user may fill in, in the order of the form.
 std::vector<platform::FormField> fieldsOf(PopplerPage* page);
 
-/// Fills in a field of a page. False for a field that is not there, or that takes no such thing.
+/// These fill in a field of a page. They answer false when the field does not exist or does not take such a
+/// value.
 bool fillField(PopplerPage* page, const platform::FieldTextEdit& edit);
 bool fillField(PopplerPage* page, const platform::FieldStateEdit& edit);
 bool fillField(PopplerPage* page, const platform::FieldChoiceEdit& edit);

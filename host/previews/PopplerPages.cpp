@@ -38,7 +38,7 @@ PopplerRectangle between(Point from, Point to)
 struct Sheet {
     int width, height; ///< pixels
     double pixelsPerPoint;
-    Point origin; ///< of the part, on the page
+    Point origin; ///< the part's origin on the page
 };
 
 void draw(PopplerPage& page, const Sheet& sheet, std::vector<std::uint32_t>& pixels)
@@ -71,7 +71,8 @@ PageMark::Kind kindOf(PopplerAnnotType type)
     }
 }
 
-/// Whether somebody adds such a thing to read or show something, rather than to build the page.
+/// Answers whether an annotation of this type adds content for the reader, rather than being a part of the
+/// page's mechanism.
 bool isAdded(PopplerAnnotType type)
 {
     switch (type) {
@@ -226,7 +227,7 @@ PageText PopplerPages::textBetween(std::size_t index, Point from, Point to) cons
         auto range = between(from, to);
         found.text =
             takenText(poppler_page_get_selected_text(selected.get(), POPPLER_SELECTION_GLYPH, &range));
-        // A selection alone counts downwards from the top.
+        // Unlike other rectangles of the library, those of a selection count downwards from the top.
         auto* region = poppler_page_get_selected_region(selected.get(), 1, POPPLER_SELECTION_GLYPH, &range);
         for (int i = 0; i < cairo_region_num_rectangles(region); ++i) {
             cairo_rectangle_int_t place;
@@ -246,7 +247,7 @@ std::vector<PopplerPages::FoundMark> PopplerPages::foundMarks(PopplerPage* page)
     auto* list = page ? poppler_page_get_annot_mapping(page) : nullptr;
     for (auto* entry = list; entry; entry = entry->next) {
         const auto* mapping = static_cast<PopplerAnnotMapping*>(entry->data);
-        // A popup is the window of another one, and comes and goes with it.
+        // A popup is the window of another annotation and comes and goes with it.
         if (poppler_annot_get_annot_type(mapping->annot) == POPPLER_ANNOT_POPUP)
             continue;
         marks.push_back(foundMark(mapping->annot, fromBottom(mapping->area, height)));

@@ -22,7 +22,7 @@ struct Unref {
 template <typename T>
 using Object = std::unique_ptr<T, Unref<T>>;
 
-/// The library's string as text; it is freed.
+/// Answers the library's string as text and frees the string.
 std::string takenText(char* text);
 platform::Error pagesError(platform::PagesErrorCode code);
 
@@ -31,7 +31,7 @@ class PopplerPages : public platform::PagedDocument {
 public:
     using Page = Object<PopplerPage>;
 
-    /// A document that has pages; `problem`, which this frees, is why there is none.
+    /// Answers a document that has pages, else the error. It takes over `problem`, the library's error.
     static platform::Result<Object<PopplerDocument>> checked(
         Object<PopplerDocument> document, GError* problem);
 
@@ -46,24 +46,25 @@ public:
     std::vector<platform::PageMark> marks(std::size_t page) const override;
     platform::PagesRights rights() const override;
 
-    /// Runs a call with the document, which nobody else uses meanwhile; answers what the call answers.
+    /// Runs a call with the document, which no other thread uses meanwhile. Answers the call's answer.
     template <typename Call>
     auto withDocument(Call&& call) const
     {
         const std::lock_guard lock(_mutex);
         return std::forward<Call>(call)(*_document);
     }
-    /// Shows another state of the document, of as many pages.
+    /// Shows another state of the document, which has as many pages.
     void setDocument(Object<PopplerDocument> document);
 
-    // For a page that is being used with its document.
+    // These need a page whose document is locked.
     static Page page(PopplerDocument& document, std::size_t index);
     static platform::Size sizeOf(PopplerPage* page);
-    /// From the library's rectangle, which counts upwards from the bottom of the page.
+    /// Answers the rectangle from the top of the page. The library's rectangle counts upwards from the
+    /// bottom.
     static platform::Rect fromBottom(const PopplerRectangle& place, double pageHeight);
     static PopplerRectangle toBottom(const platform::Rect& place, double pageHeight);
-    /// The marks of a page, each with its handle. Their identifiers are their places in this order, in which
-    /// those stand, too, that nobody sees (`isSeen` is false).
+    /// The marks of a page, each with its handle. The identifier of a mark is its index in this order, in
+    /// which invisible marks (`isSeen` is false) count as well.
     struct FoundMark {
         platform::PageMark mark;
         Object<PopplerAnnot> handle;
@@ -72,7 +73,7 @@ public:
     static std::vector<FoundMark> foundMarks(PopplerPage* page);
 
 private:
-    mutable std::mutex _mutex; // the library's documents know no threads
+    mutable std::mutex _mutex; // the library's documents are not thread-safe
     Object<PopplerDocument> _document;
     std::size_t _count;
 };

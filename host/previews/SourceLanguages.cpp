@@ -17,12 +17,12 @@ using gtk::ObjectRef;
 
 namespace {
 
-/// A language with all that its colours need. A manager of its own, because the library's objects know no
-/// threads: once the main thread has it no worker touches it again.
+/// A language with everything that its colours need. It has a language manager of its own, because the
+/// library's objects are not thread-safe: once the main thread has this, no worker touches it again.
 struct Prepared {
     ObjectRef<GtkSourceLanguageManager> manager;
     ObjectRef<GtkSourceLanguage> language;
-    ObjectRef<GtkSourceBuffer> keeper; ///< the description stays as long as some buffer uses it
+    ObjectRef<GtkSourceBuffer> keeper; ///< the language's description lives as long as some buffer uses it
 };
 
 using Languages = std::map<std::string, std::shared_ptr<const Prepared>>;
@@ -39,13 +39,14 @@ std::shared_ptr<const Prepared> prepare(const std::string& identifier)
     return prepared;
 }
 
-/// One at a time; what was prepared is kept, as are the library's own languages.
+/// Answers the language of a file name. Calls run one at a time. Prepared languages are kept, as the library
+/// keeps its own.
 std::shared_ptr<const Prepared> find(const std::string& fileName)
 {
     static std::mutex mutex;
     static const auto names = ObjectRef<GtkSourceLanguageManager>::adopt(gtk_source_language_manager_new());
-    // Never taken apart: at the end of the program the library has taken its own work back already, and a
-    // buffer that ends then complains.
+    // The map is never destroyed. At the end of the program the library has already released its objects, and
+    // a buffer that is destroyed afterwards would report an error.
     static auto& known = *std::make_unique<Languages>().release();
     const std::lock_guard lock(mutex);
     auto* found = gtk_source_language_manager_guess_language(names.get(), fileName.c_str(), nullptr);
@@ -63,7 +64,7 @@ void guess(const std::string& fileName, Answer answer)
 {
     auto& dispatch = platform::services().dispatch();
     const auto queue = dispatch.makeSerialQueue("source languages");
-    // The work keeps its own queue until it has run.
+    // The work keeps its queue alive until it has run.
     queue->async([queue, fileName, answer = std::move(answer), main = dispatch.mainQueue()] {
         main->async([queue, answer, prepared = find(fileName)] {
             answer(prepared ? prepared->language : ObjectRef<GtkSourceLanguage>());

@@ -12,11 +12,12 @@
 
 namespace host::previews {
 
-/// The languages of sources that the desktop knows how to colour.
+/// The languages of source code that the desktop can colour.
 namespace SourceLanguages {
 
-/// Finds the language of a file name and reads its description, off the main thread: the first time, those of
-/// some languages take longer than a frame. The answer comes on the main queue, null for none. Main thread.
+/// Finds the language of a file name and reads its description off the main thread, because the first read
+/// takes longer than a frame for some languages. The answer comes once, on the main queue; it is null for
+/// none. Main thread.
 using Answer = std::function<void(const gtk::ObjectRef<GtkSourceLanguage>& language)>;
 void guess(const std::string& fileName, Answer answer);
 

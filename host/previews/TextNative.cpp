@@ -23,8 +23,8 @@ using screens::PreviewView;
 
 namespace {
 
-constexpr int margin = 12; ///< around the text, points
-/// Bytes that are put in at once: a turn of the main loop stays within a frame.
+constexpr int margin = 12; ///< points around the text
+/// So many bytes are inserted at once, so that one turn of the main loop takes less than a frame.
 constexpr std::size_t pieceBytes = 8 << 10;
 constexpr double wheelStep = 1.15;
 
@@ -33,7 +33,7 @@ bool isInsideCharacter(const std::string& text, std::size_t at)
     return at < text.size() && (static_cast<unsigned char>(text[at]) & 0xC0) == 0x80;
 }
 
-/// What two texts have in common at their beginnings and ends, on whole characters.
+/// The lengths of the common beginning and the common end of two texts, in whole characters.
 struct Common {
     std::size_t front = 0, back = 0;
 };
@@ -95,7 +95,7 @@ void TextNative::build()
         GTK_STYLE_PROVIDER_PRIORITY_APPLICATION);
     gtk_scrolled_window_set_policy(GTK_SCROLLED_WINDOW(widget()), GTK_POLICY_NEVER, GTK_POLICY_AUTOMATIC);
     gtk_scrolled_window_set_child(GTK_SCROLLED_WINDOW(widget()), _text);
-    // The keyboard goes to what scrolls here, not to its frame.
+    // The text takes the keyboard focus, and its scrolled window does not.
     gtk_widget_set_focusable(_window.get(), FALSE);
 }
 
@@ -188,7 +188,7 @@ void TextNative::replaceText(const std::string& text)
 {
     auto* buffer = GTK_TEXT_BUFFER(_buffer.get());
     if (_inserting != 0) {
-        // The rest of the text before is not there yet.
+        // The rest of the previous text was not inserted yet, so it is dropped.
         g_source_remove(std::exchange(_inserting, 0));
         _shown.erase(_inserted, _insertEnd - _inserted);
     }
@@ -199,7 +199,7 @@ void TextNative::replaceText(const std::string& text)
     gtk_text_buffer_delete(buffer, &from, &to);
     if (_insertPlace)
         gtk_text_buffer_delete_mark(buffer, _insertPlace.get());
-    // Left of what is put in, so that the place goes along with it.
+    // The mark stays behind text that is inserted at it.
     _insertPlace = ObjectRef<GtkTextMark>::retain(gtk_text_buffer_create_mark(buffer, nullptr, &from, FALSE));
     _shown = text;
     _inserted = common.front;
@@ -227,7 +227,7 @@ void TextNative::insertPiece()
         finishText();
         return;
     }
-    // After the frames and the layout of what is there.
+    // The insertion runs when the main loop is idle, after the frames and the layout of the text so far.
     if (_inserting == 0)
         _inserting = g_idle_add(
             [](gpointer data) -> gboolean {
@@ -240,7 +240,8 @@ void TextNative::insertPiece()
 
 void TextNative::finishText()
 {
-    // Colours come once all of the text is there: recolouring every piece would cost more than putting it in.
+    // The colours are set when the whole text is there, because colouring every piece again would cost more
+    // than inserting it.
     if (_language)
         gtk_source_buffer_set_language(_buffer.get(), _language.get());
     publishSearch();
@@ -252,7 +253,7 @@ void TextNative::previewZoomDidChange()
     if (!view)
         return;
     char css[64];
-    // A text's zoom makes letters larger, not lines longer: less is enough.
+    // The zoom enlarges the letters and not the lines, so its square root is enough.
     g_snprintf(css, sizeof css, "textview { font-size: %d%%; }",
         static_cast<int>(std::lround(100 * std::sqrt(view->zoom()))));
     gtk_css_provider_load_from_data(_style.get(), css, -1);
@@ -327,7 +328,7 @@ void TextNative::matched(GAsyncResult* result, MatchStep step)
     publishSearch();
 }
 
-/// Stands out among the other matches, also while the search field has the focus.
+/// Marks the current match, so that it stands out among the others even while the search field has the focus.
 void TextNative::markMatch(const GtkTextIter& start, const GtkTextIter& end)
 {
     unmarkMatch();

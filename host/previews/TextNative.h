@@ -12,8 +12,8 @@
 
 namespace host::previews {
 
-/// Shows a text to be read and selected, sources in the colours of their language. A long text is put in
-/// piece by piece; of a text that has changed, only the part that differs.
+/// Shows a text to be read and selected, and source code in the colours of its language. A long text is
+/// inserted piece by piece. When a text changes, only the different part is replaced.
 class TextNative : public gtk::PreviewNative {
 public:
     explicit TextNative(const std::shared_ptr<screens::PreviewTextView>& view);
@@ -51,9 +51,10 @@ private:
     gtk::ObjectRef<GtkSourceLanguage> _language;
     gtk::ObjectRef<GtkCssProvider> _style;
     GtkWidget* _text;
-    GtkTextTag* _marked; ///< the buffer's, for the match that the search stands at
-    std::string _shown; ///< what the buffer has or is about to have
-    std::size_t _inserted = 0, _insertEnd = 0; ///< bytes of `_shown`: what is missing in the buffer
+    GtkTextTag* _marked; ///< belongs to the buffer; marks the current match
+    std::string _shown; ///< the text that the buffer has or will have
+    std::size_t _inserted = 0,
+                _insertEnd = 0; ///< range of bytes of `_shown` that the buffer does not have yet
     gtk::ObjectRef<GtkTextMark> _insertPlace;
     guint _inserting = 0;
     std::string _fileName;

@@ -17,9 +17,9 @@ using platform::TextEnd;
 
 namespace {
 
-/// More does not make the guess better.
+/// Looking at more bytes does not improve the guess.
 constexpr std::size_t looked = 256U << 10U;
-/// Of a word or two with fewer bytes beyond ASCII the statistics say anything; most of them are Western.
+/// A text with fewer bytes beyond ASCII tells the statistics nothing. Most such texts are Western.
 constexpr std::ptrdiff_t fewestTelling = 6;
 constexpr auto replacement = "\uFFFD";
 
@@ -28,7 +28,8 @@ bool isBeyondAscii(char byte)
     return (static_cast<unsigned char>(byte) & 0x80U) != 0;
 }
 
-/// Where the standards have control characters, which no text has, Windows has quotes and letters.
+/// Answers whether the text has bytes for which the standard encodings have control characters, which no text
+/// uses, and the Windows encodings have quotes and letters.
 bool hasWindowsSigns(std::string_view bytes)
 {
     return std::ranges::any_of(
@@ -46,7 +47,7 @@ std::string encodingOf(std::string_view bytes)
     return uchardet_get_charset(detector.get());
 }
 
-/// The pages of Windows that hold the letters of a standard, most of them at its places.
+/// Answers the Windows code page with the letters of a standard encoding, most of them at the same codes.
 std::string windowsPage(const std::string& standard)
 {
     constexpr std::pair<const char*, const char*> pages[] = {{"ISO-8859-1", "WINDOWS-1252"},
@@ -65,7 +66,7 @@ using Converter = std::unique_ptr<std::remove_pointer_t<GIConv>, CloseConverter>
 std::string converted(const Converter& converter, std::string_view bytes, TextEnd end)
 {
     std::string text;
-    char* from = const_cast<char*>(bytes.data()); // only read
+    char* from = const_cast<char*>(bytes.data()); // iconv only reads it
     gsize left = bytes.size();
     while (left > 0) {
         char piece[4096];
@@ -95,7 +96,7 @@ std::optional<std::string> UchardetDecoder::decode(std::string_view bytes, TextE
     auto encoding = encodingOf(bytes);
     if (hasWindowsSigns(bytes))
         encoding = windowsPage(encoding);
-    // Well-formed UTF-8 does not come here.
+    // Well-formed UTF-8 has already been decoded elsewhere.
     if (encoding.empty() || encoding.starts_with("UTF-") || encoding == "ASCII")
         return std::nullopt;
     auto* opened = g_iconv_open("UTF-8", encoding.c_str());

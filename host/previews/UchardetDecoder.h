@@ -7,7 +7,7 @@
 
 namespace host::previews {
 
-/// Tells encodings by how often which characters follow each other, with uchardet.
+/// Guesses encodings with uchardet, by how often which characters follow each other.
 class UchardetDecoder : public platform::TextDecoder {
 public:
     std::optional<std::string> decode(std::string_view bytes, platform::TextEnd end) const override;
