@@ -25,7 +25,7 @@ inline double milliseconds(Clock::duration duration)
     return std::chrono::duration<double, std::milli>(duration).count();
 }
 
-/// The value that a share of the others (0 to 1) is below.
+/// Answers the value below which a share (0 to 1) of the others lies.
 inline double percentile(std::vector<double> values, double share)
 {
     std::ranges::sort(values);
@@ -37,7 +37,7 @@ inline double median(const std::vector<double>& values)
     return percentile(values, 0.5);
 }
 
-/// Folders of documents with ordinary names, made once for each size and removed at the end.
+/// Folders of documents with ordinary names, which are made once for each size and removed at the end.
 class Folders {
 public:
     ~Folders()

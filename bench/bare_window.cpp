@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// The peer of the start figure: a libadwaita window with a header bar and one label, nothing else.
+// This is the floor of the start's benchmark: a libadwaita window with only a header bar and one label.
 
 #include <adwaita.h>
 

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// A move through coordination that nobody else asks for, beside the bare rename. What coordination costs is
-// the difference: at most 20 microseconds are fine.
+// This measures a coordinated move that nobody else waits for, beside the bare rename. The difference is the
+// cost of coordination, which may be up to 20 microseconds.
 
 #include "host/system/coordination/LocalFileCoordinator.h"
 #include "host/system/queues/GLibDispatch.h"
@@ -23,7 +23,7 @@ using platform::Url;
 using platform::WritingOptions;
 using Clock = std::chrono::steady_clock;
 
-/// A document two folders below a drive's top level, and its other name.
+/// A document two folders below a drive's top level, and its second name.
 class Drive {
 public:
     Drive()
@@ -92,7 +92,7 @@ double median(std::vector<double>& times)
     return *middle;
 }
 
-/// Moves forth and back, bare and coordinated in turn, so that both meet the same machine, and compares the
+/// Moves back and forth, bare and coordinated in turn, so that both run under the same load, and compares the
 /// medians.
 void compare(benchmark::State& state, const Drive& drive, LocalFileCoordinator& coordinator)
 {

@@ -1,9 +1,9 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// Finding a document by its identifier, beside what nobody can do without: one look into the database, one
-// open and one read of the attribute. The drive holds as many documents with an identifier as the argument
-// says; they are looked up in an order that has nothing to do with their places.
+// This measures finding a document by its identifier, beside the least that it takes: one database query, one
+// open and one read of the attribute. The argument is the number of documents with an identifier; they are
+// looked up in an order unrelated to their places.
 
 #include "host/drive/identity/LocalDocumentIdentifiers.h"
 #include "host/drive/records/ItemFacts.h"
@@ -64,7 +64,7 @@ public:
     std::vector<std::uint32_t> known;
 };
 
-/// The floor's own connection, opened and prepared once.
+/// The floor's own connection, which is opened and prepared once.
 class Floor {
 public:
     explicit Floor(const std::string& home)

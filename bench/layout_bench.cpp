@@ -15,7 +15,7 @@ namespace {
 using namespace platform;
 using namespace kit;
 
-/// A screen of 100 constrained views: fifty rows of a name and a value, the names sharing one width.
+/// A screen of 100 constrained views: fifty rows of a name and a value, where all names have the same width.
 class Form {
 public:
     Form()
@@ -66,7 +66,7 @@ void firstLayout(benchmark::State& state)
 }
 BENCHMARK(firstLayout)->Unit(benchmark::kMicrosecond);
 
-/// The floor: the same number of views, placed by hand.
+/// The floor: the same number of views, whose frames are computed by hand.
 void placedByHand(benchmark::State& state)
 {
     Form form;

@@ -1,11 +1,12 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// A folder's list, sorted and ready on the main queue, beside its floor: getdents64 and statx of everything
-// in the same folder in one thread. Each size prints the ratio as "x_floor" and, for large folders, when the
-// first rows came.
+// This measures a folder's list, from the call until the sorted rows are on the main queue, beside its floor:
+// getdents64 and statx of everything in the same folder on one thread. Each size prints the ratio as
+// "x_floor" and, for large folders, the time of the first rows.
 //
-// The folder is made under TMPDIR (/tmp). Run on an idle machine; the list uses all cores, the floor one.
+// The folder is made under TMPDIR (/tmp). Run this on an idle machine, because the list uses all cores and
+// the floor only one.
 
 #include "ListedFolders.h"
 #include "host/system/files/DirectoryReader.h"
@@ -95,7 +96,7 @@ void listFolder(benchmark::State& state)
 }
 BENCHMARK(listFolder)->Arg(1'000)->Arg(10'000)->Arg(100'000)->UseManualTime()->Unit(benchmark::kMillisecond);
 
-/// Of the list's work, what one thread does for each name: its kind and its sort key.
+/// Measures the part of the list's work that one thread does for each name: its kind and its sort key.
 void classifyAndKey(benchmark::State& state)
 {
     const host::system::EntryClassifier classifier(std::make_shared<host::system::MimeTypeRegistry>());

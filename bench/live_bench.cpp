@@ -1,12 +1,12 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// How soon an open list shows a change on disk, beside a bare loop over inotify and statx in the same run;
-// and how long the main loop stays away while 10,000 files arrive.
+// This measures how soon an open list shows a change on disk, beside a bare loop over inotify and statx in
+// the same run, and how long the main loop is blocked while 10,000 files arrive.
 //
-// "latency_ms" begins when the file is being made and ends on the main thread, when the rows of the list are
-// those with the new name; 10 ms of it are the list's wait for what a saving program does next. A list of
-// 100,000 items in other orders is measured, too: its items are looked at once, not with every change.
+// "latency_ms" begins when the file is being made and ends on the main thread when the list's rows contain
+// the new name. It includes 10 ms for which the list waits for the next step of a saving program. A list of
+// 100,000 items is measured in other orders, too; its items are read once, not at every change.
 
 #include "ListedFolders.h"
 #include "host/system/desktop/MimeTypeRegistry.h"
@@ -53,7 +53,8 @@ std::shared_ptr<host::system::GLibDispatch> installedDispatch()
     return dispatch;
 }
 
-/// The longest turns of GLib's main loop while it lives: what lies between two calls of poll().
+/// Measures the longest turns of GLib's main loop while it lives. A turn is the time between two calls of
+/// poll().
 class TurnMeter {
 public:
     TurnMeter()
@@ -112,7 +113,7 @@ public:
     }
     std::size_t count() const { return _contents->rows()->count(); }
     int updates() const { return _updates; }
-    /// Lets what is going on in the list come to its end.
+    /// Lets the list's pending work come to its end.
     static void rest(std::chrono::milliseconds pause)
     {
         bool isOver = false;
@@ -132,7 +133,7 @@ void makeFile(const std::string& path)
     ::close(::open(path.c_str(), O_CREAT | O_WRONLY | O_CLOEXEC, 0600));
 }
 
-/// From the making of a file to the end of a look at it, by nobody but the kernel.
+/// Answers the time from making a file to reading its attributes, with nothing but the kernel between.
 double floorOnce(int queue, const std::string& path)
 {
     const auto began = Clock::now();
@@ -204,7 +205,7 @@ void showChangeByDate(benchmark::State& state)
 }
 BENCHMARK(showChangeByDate)->Arg(100'000)->Iterations(1)->Unit(benchmark::kMillisecond);
 
-/// Files are made as quickly as a thread can while the list is open.
+/// Makes files as quickly as a thread can while the list is open.
 void filesArrive(benchmark::State& state)
 {
     const auto& path = folders().ofSize(static_cast<int>(state.range(0)));
@@ -235,7 +236,8 @@ void filesArrive(benchmark::State& state)
 }
 BENCHMARK(filesArrive)->Arg(100)->Arg(100'000)->Iterations(1)->Unit(benchmark::kMillisecond);
 
-/// What an open list keeps for each of its items, and how much more after 10,000 files came and went.
+/// Measures the memory of an open list for each of its items, and its growth after 10,000 files came and
+/// went.
 void memoryOfAnItem(benchmark::State& state)
 {
     const auto& path = folders().ofSize(100'000);

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// The cost of a log call at a disabled level, beside the loop around it.
+// This measures a log call at a disabled level, beside the loop around it.
 
 #include "platform/Log.h"
 

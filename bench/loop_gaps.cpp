@@ -1,12 +1,12 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// A library to preload: reports how long the main thread stays away from its loop.
+// This library, when preloaded, reports how long the main thread stays away from its loop.
 //
 // LD_PRELOAD=libloop_gaps.so PROGRAM prints a line on standard error for each turn of the main loop that took
-// longer than 8 ms of wall time, with the thread's own part of it and the time since the start, and at the
-// end the longest turn. The loop sleeps in poll(); a turn is what lies between one return from it and the
-// next call. On a busy machine the thread's own time is the one to look at.
+// longer than 8 ms of wall time, with the processor time of the thread in it and the time since the start. At
+// the end it prints the longest turn. The loop sleeps in poll(); a turn is the time between one return from
+// it and the next call. On a busy machine the processor time is the more telling one.
 
 #include <chrono>
 #include <cstdio>
@@ -22,9 +22,9 @@ namespace {
 using Clock = std::chrono::steady_clock;
 using Milliseconds = std::chrono::duration<double, std::milli>;
 
-constexpr double longTurn = 8; // milliseconds: half a frame
+constexpr double longTurn = 8; // milliseconds, half a frame
 
-/// The milliseconds that this thread has computed so far.
+/// Answers the processor time of this thread so far, in milliseconds.
 double computed()
 {
     timespec used{};

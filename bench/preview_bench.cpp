@@ -1,9 +1,9 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// From the tap to the first pixels of a document, beside what nobody can do without: for a photo of 20
-// million pixels the bare decoding to the screen's size, for a PDF document of 500 pages the bare drawing of
-// page one.
+// This measures the time from the tap to the first pixels of a document, beside the least that it takes: for
+// a photo of 20 million pixels decoding it to the screen's size, for a PDF document of 500 pages drawing page
+// one.
 
 #include "host/drive/service/LocalCloudDocumentService.h"
 #include "host/previews/PopplerDocuments.h"
@@ -80,7 +80,7 @@ std::string pdfOfManyPages()
     return objects + "trailer<</Root 1 0 R/Size 2000>>\nstartxref\n" + std::to_string(start) + "\n%%EOF\n";
 }
 
-/// A drive with the two documents, and the services that a preview asks.
+/// A drive with the two documents, and the services that a preview calls.
 class Drive {
 public:
     Drive()
@@ -141,7 +141,7 @@ double milliseconds(const std::function<void()>& work)
     return std::chrono::duration<double, std::milli>(Clock::now() - start).count();
 }
 
-/// The best of a few measurements of each, taken in turns so that both meet the same machine.
+/// Takes the best of a few measurements of each, in turns, so that both run under the same load.
 void compare(benchmark::State& state, const std::function<void()>& ours, const std::function<void()>& floor)
 {
     double best = 1e9, bestFloor = 1e9;
@@ -186,8 +186,7 @@ void drawPageOneBare()
 
 const screens::PreviewLimits& limits()
 {
-    static const screens::PreviewLimits made{
-        .maxImageWidth = screenWidth, .maxImageHeight = screenHeight};
+    static const screens::PreviewLimits made{.maxImageWidth = screenWidth, .maxImageHeight = screenHeight};
     return made;
 }
 

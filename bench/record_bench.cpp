@@ -1,8 +1,9 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// Reading an item into its record, beside the system calls that nobody can do without: for a local file one
-// statx and one getxattr, for a promise one statx that fails and the promise's file read once.
+// This measures reading an item into its record, beside the system calls that it cannot do without: for a
+// local file one statx and one getxattr, for a promise one statx that fails and one read of the promise's
+// file.
 
 #include "host/drive/records/PromiseRecord.h"
 #include "host/drive/service/LocalCloudDocumentService.h"
@@ -35,7 +36,7 @@ using platform::Url;
 
 constexpr int itemCount = 64;
 
-/// A drive with local files and promises, and the services that a record asks.
+/// A drive with local files and promises, and the services that a record calls.
 class Drive {
 public:
     Drive()
@@ -121,8 +122,8 @@ double median(std::vector<double>& times)
     return *middle;
 }
 
-/// Runs floor and reading in turn over all items, so that both meet the same machine, and compares the
-/// medians.
+/// Runs the floor and the reading in turn over all items, so that both run under the same load, and compares
+/// the medians.
 void compare(benchmark::State& state, const std::vector<Url>& urls, void (*floor)(const std::string&))
 {
     std::vector<double> floorTimes, readTimes;

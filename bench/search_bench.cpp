@@ -1,12 +1,12 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// A search as typed over a million names, beside its floor: one scan of the packed folded names for the same
-// text that skips from hit to hit and counts the names hit. Prints the ratio as "x_floor", what was found,
-// and the memory for each item.
+// This measures a search over a million names while the query is typed, beside its floor: one scan of the
+// packed folded names for the same text that skips from hit to hit and counts the names. It prints the ratio
+// as "x_floor", the number of hits, and the memory for each item.
 //
 // "gathering" reads the names of a real tree of 100,000 items (made under TMPDIR) and brings an index of it
-// up to date where nothing changed; its floor is a walk that reads the same folders and keeps nothing.
+// up to date when nothing has changed. Its floor is a walk that reads the same folders and keeps nothing.
 
 #include "host/system/desktop/MimeTypeRegistry.h"
 #include "host/system/files/DirectoryReader.h"
@@ -57,7 +57,7 @@ const NameIndex& index()
     return made;
 }
 
-/// Counts the names that hold a text, by nothing but a scan.
+/// Counts the names that contain a text, by scanning alone.
 std::size_t scan(std::string_view names, std::string_view text)
 {
     std::size_t count = 0;
@@ -81,7 +81,7 @@ double seconds(Clock::duration duration)
 void search(benchmark::State& state, const char* query)
 {
     const auto& names = index();
-    // Of several words the longest is looked for first; here it is the first one.
+    // A search looks for the longest of several words first, which here is the first one.
     const auto firstWord = std::string_view(query).substr(0, std::string_view(query).find(' '));
     double found = 0, floor = 0;
     std::size_t total = 0;
@@ -166,7 +166,8 @@ void gather(benchmark::State& state, bool again)
 
 } // namespace
 
-// The queries of somebody who types "report 4217", a letter that stands nearly everywhere, and nothing there.
+// The queries are those of a person who types "report 4217", a letter that occurs nearly everywhere, and a
+// text that occurs nowhere.
 BENCHMARK_CAPTURE(search, r, "r")->UseManualTime()->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(search, rep, "rep")->UseManualTime()->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(search, report_space_4, "report 4")->UseManualTime()->Unit(benchmark::kMillisecond);

@@ -1,11 +1,12 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// Process start to the first painted list, beside a bare libadwaita window started the same way.
+// This measures the time from the start of the process to the first painted list, beside a bare libadwaita
+// window that is started the same way.
 //
 // Usage: start_bench ROUNDS PROGRAM PEER, with DISPLAY and TARROW_DRIVE_HOME set. Both are started in turn,
-// each in a session of its own; a start ends with the line "First list on screen" on standard error. Prints
-// the medians and their ratio.
+// each in a session of its own. A start ends with the line "First list on screen" on standard error. It
+// prints the medians and their ratio.
 
 #include <algorithm>
 #include <chrono>
@@ -37,7 +38,8 @@ bool readUntilMarker(int descriptor)
     return false;
 }
 
-/// Milliseconds from the start of the process to its marker; negative when it never came.
+/// Answers the milliseconds from the start of the process to its line, or a negative number when it never
+/// came.
 double startOnce(const char* program)
 {
     int ends[2];

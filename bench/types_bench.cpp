@@ -14,7 +14,7 @@ namespace {
 
 constexpr std::size_t count = 100'000;
 
-/// Names as people have them: some extensions over and over, some of their own, some none.
+/// Answers names like those that people use: some extensions often, some once, some names without any.
 const std::vector<std::string>& names()
 {
     static const auto all = [] {
@@ -29,7 +29,7 @@ const std::vector<std::string>& names()
     return all;
 }
 
-/// The peer: the library's own guess by the name.
+/// Measures the floor, the library's own guess by the name.
 void guess(benchmark::State& state)
 {
     for (auto each : state) {
@@ -54,7 +54,7 @@ void classify(benchmark::State& state)
 }
 BENCHMARK(classify)->Unit(benchmark::kMillisecond);
 
-/// The type of each name's extension.
+/// Measures the type of each name's extension.
 void typeOfExtension(benchmark::State& state)
 {
     const host::system::MimeTypeRegistry types;
