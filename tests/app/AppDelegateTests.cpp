@@ -36,7 +36,7 @@ struct NoLoop : platform::Application {
 
 class AppDelegateTest : public BrowserFixture {
 protected:
-    /// Launches the application; answers what the delegate said.
+    /// Launches the application and answers the delegate's answer.
     bool launchApplication(const LaunchOptions& options = {})
     {
         app = std::make_shared<AppDelegate>();
@@ -83,8 +83,7 @@ protected:
     std::shared_ptr<kit::SearchPresentation> searchAfterDelay()
     {
         dispatch->advance(0.8);
-        return std::dynamic_pointer_cast<kit::SearchPresentation>(
-            browser->presentedViewController());
+        return std::dynamic_pointer_cast<kit::SearchPresentation>(browser->presentedViewController());
     }
 
     NoLoop application;
@@ -175,7 +174,7 @@ TEST_F(AppDelegateTest, BadURLsAreRefusedAndNothingMoves)
         inside + " ", "tarrowdriveapp:///a%zz", "tarrowdriveapp:///a%4", "tarrowdriveapp:///a%",
         "tarrowdriveapp:///a%00b", "tarrowdriveapp:///a%2Fb", "tarrowdriveapp:///%ff",
         "tarrowdriveapp:///%c0%ae",
-        // Ours, but nothing of the drive.
+        // These are URLs of our own scheme, but none names an item of the drive.
         "tarrowdriveapp:", "tarrowdriveapp:///", "tarrowdriveapp:///etc/passwd", schemeURL("../../../drive"),
         schemeURL("Folder/%2e%2e/%2E./%252e%252e/account.json"), schemeURL("Folder/a/../../../.."),
         schemeURL("Folder/note.txt/.."), schemeURL("../../documents-evil/Folder"),

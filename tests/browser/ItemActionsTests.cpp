@@ -35,7 +35,8 @@ protected:
             topList(), action, item, topList()->view(), [this] { ++completions; });
         settle();
     }
-    /// Types a name into the prompt that is shown and confirms it; answers the message that it leaves.
+    /// Types a name into the prompt on the screen and confirms it. Answers the message that the prompt then
+    /// shows.
     std::string enter(const std::string& name)
     {
         const auto prompt = browser->folderPromptAlert();
@@ -50,7 +51,7 @@ protected:
             items, nullptr, topList(), [this] { ++completions; });
     }
     bool isThere(std::string_view path) const { return std::filesystem::exists(url(path).path()); }
-    /// The title of the alert that is shown, which is closed; empty without one.
+    /// Closes the alert on the screen and answers its title; empty without one.
     std::string takeAlert()
     {
         const auto shown = alert();
@@ -306,7 +307,7 @@ TEST_F(ItemActionsTest, WithoutAnyFolderAMoveMakesOne)
     const auto note = documents.appendingPathComponent("note.txt");
     std::filesystem::copy_file(write("note.txt").path(), note.path());
     launch();
-    // With only one container there is nowhere else to go.
+    // With one container there is no other folder to move to.
     std::filesystem::remove_all(drive.layout().defaultContainer());
     browser->showMoveTargetForItemsInFolder({note}, documents);
     ASSERT_NE(alert(), nullptr);

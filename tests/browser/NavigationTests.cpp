@@ -25,10 +25,10 @@ namespace tarrow {
 namespace {
 
 using namespace testing_support;
+using kit::SearchPresentation;
 using platform::Url;
 using screens::DocumentListAction;
 using screens::DocumentListController;
-using kit::SearchPresentation;
 using testing::ElementsAre;
 
 constexpr auto top = "BrindleDefault";
@@ -165,7 +165,7 @@ TEST_F(NavigationTest, WarpsReplaceTheStackOrAreRefused)
     struct Row {
         const char* name;
         std::optional<Url> target;
-        std::vector<std::string> expectedStack; ///< empty: refused
+        std::vector<std::string> expectedStack; ///< empty: the jump is refused
     };
     const Row rows[] = {
         {"the top", url(""), {top}},

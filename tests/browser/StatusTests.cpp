@@ -25,8 +25,8 @@ class StatusTest : public BrowserFixture {
 protected:
     DriveStatusLabelView& view(std::size_t index = 0) const
     {
-        const auto list = std::dynamic_pointer_cast<screens::DocumentListController>(
-            browser->viewControllers().at(index));
+        const auto list =
+            std::dynamic_pointer_cast<screens::DocumentListController>(browser->viewControllers().at(index));
         return *statusBar(*list)->labelsView();
     }
     const std::string& statusText() const { return view().primaryLabel()->text(); }
@@ -103,7 +103,7 @@ TEST_F(StatusTest, AnOfferReachesEveryListAndTheQuotaIsFetchedThreeTimes)
     launch();
     browser->warpToNewURLPreviewMode(url("Folder"), PreviewModeQuick);
     settle();
-    // Only lists that were on top have a status bar.
+    // Only a list that was on top has a status bar.
     browser->popViewController(false);
     settle();
     const int before = cloud->requests;

@@ -30,11 +30,11 @@ using testing::ElementsAre;
 
 constexpr auto top = "BrindleDefault";
 
-/// Shows every movement until it is told that it ends.
+/// Keeps every movement going until the test ends it.
 class SlowScreen : public kit::NavigationObserver {
 public:
-    void navigationWillTransition(kit::NavigationController&,
-        const kit::NavigationTransition&, kit::TransitionToken token) override
+    void navigationWillTransition(
+        kit::NavigationController&, const kit::NavigationTransition&, kit::TransitionToken token) override
     {
         movement = std::move(token);
     }
@@ -44,7 +44,7 @@ public:
     kit::TransitionToken movement;
 };
 
-/// Entries from outside that come in the middle of something.
+/// Requests from outside that arrive in the middle of another action.
 class WarpTest : public BrowserFixture {
 protected:
     void open(const Url& document)
@@ -73,7 +73,7 @@ TEST_F(WarpTest, AQuestionThatIsOpenIsDroppedUnanswered)
     EXPECT_THAT(stack(), ElementsAre(top, "Folder", "*"));
     EXPECT_TRUE(FileUtils::exists(first));
 
-    // A refused entry closes the question, too, and leaves the rest.
+    // A refused request closes the question as well, and leaves the rest as it is.
     LookwellItemController::defaultController()->showWarningAndDeleteDocument(nullptr);
     ASSERT_NE(alert(), nullptr);
     EXPECT_FALSE(warp("../../trash/second.txt"));
@@ -209,8 +209,8 @@ TEST_F(WarpTest, ASearchResultIsPreviewedWhereTheSearchWas)
     launch();
     topList()->startSearchWithQueryStringBecomeFirstResponder("note", true);
     settle();
-    ASSERT_NE(std::dynamic_pointer_cast<kit::SearchPresentation>(browser->presentedViewController()),
-        nullptr);
+    ASSERT_NE(
+        std::dynamic_pointer_cast<kit::SearchPresentation>(browser->presentedViewController()), nullptr);
     open(note);
     EXPECT_EQ(browser->presentedViewController(), nullptr);
     EXPECT_THAT(stack(), ElementsAre(top, "*"));

@@ -19,7 +19,7 @@ using testing::IsEmpty;
 
 class FileTagsTest : public testing::Test {
 protected:
-    /// Replaces the store as another program does, and lets the change be heard.
+    /// Replaces the store's file as another program does, and delivers the notice of the change.
     void store(const std::string& json)
     {
         const auto path = drive.layout().keyValueStore(), beside = path + ".new";
@@ -37,7 +37,7 @@ protected:
     const std::string emptyLine = "WARNING Pathwell tag dictionary is empty";
 };
 
-// The table is kept for the life of the process, so this is one story.
+// One test tells the whole story, because the table is kept for the life of the process.
 TEST_F(FileTagsTest, TheTableFollowsTheStore)
 {
     const auto& colors = FileTags::_tagBlipColors();

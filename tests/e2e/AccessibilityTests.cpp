@@ -10,7 +10,7 @@
 namespace e2e {
 namespace {
 
-/// The rows that lead to documents of the sample, and a button of their previews.
+/// The rows that lead to documents of the sample drive, and a button in each one's preview.
 const struct {
     std::vector<std::string> rows;
     std::string control;
@@ -21,10 +21,10 @@ const struct {
     {{"Documents", "Tickets", "Night train"}, "Search in document"},
 };
 
-/// What somebody meets who hears the program instead of seeing it.
+/// Checks what a user of a screen reader hears.
 class AccessibilityTests : public DriveTests {
 protected:
-    /// Every place that the keyboard can go to says what it is.
+    /// Checks that every widget that can take the keyboard focus has a name.
     void expectNames(const std::string& state) const
     {
         // The toolkit names a widget without a name after its class.

@@ -179,7 +179,7 @@ bool Accessible::waitFor(const std::function<bool()>& condition)
             return G_SOURCE_CONTINUE;
         },
         &isLate);
-    // The tree tells nothing by itself: it is looked at again after each tick.
+    // The accessibility tree sends no notice of its own, so it is read again at each tick.
     const guint tick = g_timeout_add(
         pause, [](gpointer) -> gboolean { return G_SOURCE_CONTINUE; }, nullptr);
     bool holds = condition();

@@ -13,7 +13,7 @@
 
 namespace e2e {
 
-/// A place in the program's window, which begins at the corner of its display; pixels.
+/// A point in the program's window, in pixels from the corner of its display.
 struct Place {
     double x = 0, y = 0;
 };
@@ -27,34 +27,34 @@ public:
 
     explicit operator bool() const { return _node != nullptr; }
     std::string name() const;
-    /// Whether the node was there at the last look and is meant to be seen.
+    /// Answers whether the node existed at the last look and is visible.
     bool isVisible() const { return hasState(ATSPI_STATE_VISIBLE); }
-    /// Performs the first action of the node; false when it has none.
+    /// Performs the first action of the node. Answers false when it has none.
     bool press() const;
-    /// Performs the action of this name; false when there is none.
+    /// Performs the action of this name. Answers false when there is none.
     bool perform(const std::string& action) const;
-    /// All visible nodes below that match, in the order of the tree. Of a long list only the first are looked
-    /// at.
+    /// Answers all visible nodes below that match, in the order of the tree. Of a long list only the first
+    /// rows are searched.
     std::vector<Accessible> all(const std::function<bool(const Accessible&)>& matches) const;
     bool isButton() const;
     bool isEntry() const;
     bool isDialog() const;
     bool hasRole(AtspiRole role) const;
-    /// Whether the keyboard is here.
+    /// Answers whether the node has the keyboard focus.
     bool isFocused() const { return hasState(ATSPI_STATE_FOCUSED); }
-    /// Whether the keyboard can go here.
+    /// Answers whether the node can take the keyboard focus.
     bool isFocusable() const { return hasState(ATSPI_STATE_FOCUSABLE); }
     std::string roleName() const;
     bool isSensitive() const { return hasState(ATSPI_STATE_SENSITIVE); }
-    /// The content of a text.
+    /// Answers the content of a text widget.
     std::string text() const;
     Place middle() const;
-    /// Replaces the text of an entry; false when it takes none.
+    /// Replaces the text of an entry. Answers false when it takes none.
     bool enter(const std::string& text) const;
 
-    /// The running application of this program name and process; null: it has not appeared.
+    /// Answers the running application of this name and process, or null when it has not appeared.
     static Accessible application(const std::string& program, pid_t process);
-    /// Lets messages through until a condition holds; false after twenty seconds.
+    /// Runs the main loop until a condition holds. Answers false after twenty seconds.
     static bool waitFor(const std::function<bool()>& condition);
 
 private:

@@ -17,7 +17,7 @@ TEST_F(BrowseTests, TwoFoldersInAndBack)
     EXPECT_TRUE(eventually([this] { return program->shows("Ideas.md"); }));
     program->press("Travel");
     EXPECT_TRUE(eventually([this] { return program->shows("Tuscany.md"); }));
-    // Assistive technology meets only the screen that is shown.
+    // Assistive technology sees only the screen that is shown.
     EXPECT_FALSE(program->shows("Ideas.md"));
     EXPECT_EQ(program->buttons("Back").size(), 1);
     program->press("Back");

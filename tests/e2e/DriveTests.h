@@ -15,7 +15,7 @@
 
 namespace e2e {
 
-/// The real program on a sample drive of its own.
+/// Runs the real program on a sample drive of its own.
 class DriveTests : public ::testing::Test {
 protected:
     void SetUp() override
@@ -23,7 +23,8 @@ protected:
         auto place = std::string(getenv("HOME")) + "/XXXXXX";
         ASSERT_TRUE(mkdtemp(place.data()));
         home = place;
-        // The default place of a home, so that two programs with their own states can share it.
+        // The drive lies in the default place of the data folder, so that two programs with separate states
+        // can share it.
         environment = {{"XDG_DATA_HOME", home / "data"}, {"XDG_STATE_HOME", home / "state"}};
         ASSERT_EQ(Program::run({getenv("TRW_ACCOUNT"), "make-sample"}, environment), 0);
         documents = home / "data/tarrow-drive/local/documents";
@@ -33,14 +34,14 @@ protected:
     void TearDown() override
     {
         program.reset();
-        // The sample has a folder that cannot be read.
+        // The sample drive has a folder that cannot be read, and so could not be removed.
         std::filesystem::permissions(top / "Documents/Locked drawer", std::filesystem::perms::owner_all);
         std::filesystem::remove_all(home);
     }
 
     void start() { program.emplace(environment); }
 
-    /// What another program does to the drive.
+    /// Runs a command of another program on the drive.
     int files(const std::vector<std::string>& arguments) const
     {
         std::vector<std::string> command{getenv("TRW_FILES")};
@@ -48,7 +49,7 @@ protected:
         return Program::run(command, environment);
     }
 
-    /// Waits for a condition; says what is on the screen when it does not come to hold.
+    /// Waits for a condition. On failure it reports what is on the screen.
     ::testing::AssertionResult eventually(const std::function<bool()>& condition) const
     {
         if (Accessible::waitFor(condition))

@@ -11,7 +11,7 @@ namespace {
 constexpr unsigned returnKey = 0xff0d, escape = 0xff1b, deleteKey = 0xffff, f2 = 0xffbf, menuKey = 0xff67,
                    down = 0xff54, up = 0xff52, space = ' ', tab = 0xff09;
 
-/// All by the keyboard, as somebody without a pointer does it.
+/// Uses the program by the keyboard alone, as a user without a pointer does.
 class KeyboardTests : public DriveTests {
 protected:
     void expectKeyboardAt(const std::string& beginning)
@@ -22,7 +22,7 @@ protected:
     {
         EXPECT_TRUE(eventually([&] { return program->dialogs().empty() != isShown; }));
     }
-    /// Goes to a document on the desktop.
+    /// Starts the program and goes to a document on the desktop.
     void goTo(const std::string& letters, const std::string& name)
     {
         start();
@@ -39,7 +39,7 @@ protected:
             return !entries.empty() && entries.back().isFocused();
         }));
     }
-    /// Puts another text in the place of the one in the entry.
+    /// Replaces the text in the entry.
     void replaceText(const std::string& text)
     {
         expectKeyboardInEntry();
@@ -62,7 +62,7 @@ TEST_F(KeyboardTests, LeadsThroughTheFolders)
     expectKeyboardAt("Household");
     type("read");
     expectKeyboardAt("Reading notes");
-    // Tab leaves the list, however many rows it has, and comes back to the row.
+    // Tab leaves the list, however many rows it has, and Shift+Tab returns to the row.
     pressKey(tab);
     expectKeyboardAt("Back");
     pressKey(tab, Modifier::Shift);
@@ -75,7 +75,7 @@ TEST_F(KeyboardTests, LeadsThroughTheFolders)
     expectKeyboardAt("Documents");
 }
 
-/// Somebody who knows the way does not wait for what is shown.
+/// The keys come quicker than the screens appear, as from a user who knows the program by heart.
 TEST_F(KeyboardTests, KeysThatComeAtOnceArriveWhereTheyWereMeant)
 {
     goTo("to", "To do.txt");

@@ -21,8 +21,8 @@ namespace e2e {
 namespace {
 
 constexpr int looksBetweenPresses = 20;
-constexpr std::size_t lastLines = 30; ///< of the log, in the message of a test that fails
-constexpr unsigned controlKeycode = 37, shiftKeycode = 50; ///< of every PC keyboard under X
+constexpr std::size_t lastLines = 30; ///< lines of the log in the message of a failed test
+constexpr unsigned controlKeycode = 37, shiftKeycode = 50; ///< codes of every PC keyboard under X
 
 bool begins(const std::string& text, const std::string& beginning)
 {
@@ -84,8 +84,8 @@ Program::Program(const Environment& changes)
 {
     static int programs = 0;
     _errors = std::string(getenv("HOME")) + "/errors." + std::to_string(++programs);
-    EXPECT_LE(atspi_init(), 1); // 1: a program before this one did it
-    // The first look starts the registry; a program that comes before it may stay unseen.
+    EXPECT_LE(atspi_init(), 1); // 1 means that an earlier program of this process did it
+    // The first look starts the accessibility registry, which might not see a program that started before it.
     atspi_accessible_get_child_count(atspi_get_desktop(0), nullptr);
     _process = spawn({getenv("TRW_PROGRAM")}, changes, _errors);
     EXPECT_TRUE(Accessible::waitFor([this] {
@@ -127,7 +127,7 @@ bool Program::says(const std::string& name) const
 
 bool Program::hasKeyboardAt(const std::string& beginning) const
 {
-    // The row of a list is inside the place that has the keyboard.
+    // The widget with the keyboard focus contains the row of a list.
     const auto places = all([](const Accessible& node) { return node.isFocused(); });
     return std::ranges::any_of(places, [&](const Accessible& place) {
         return begins(place.name(), beginning)
@@ -171,7 +171,7 @@ std::vector<Accessible> Program::dialogs() const
 
 void Program::press(const std::string& beginning) const
 {
-    // A bar that changes takes its buttons away between the look and the press.
+    // The look is repeated, because a changing bar may remove its buttons between the look and the press.
     EXPECT_TRUE(Accessible::waitFor([&] {
         const auto found = buttons(beginning);
         return !found.empty() && found.back().press();

@@ -12,8 +12,8 @@
 
 namespace e2e {
 
-/// A running Tarrow Drive, driven through its accessibility tree and the keyboard. What it complains about
-/// while it runs, and an end that is not in order, fails the test.
+/// A running Tarrow Drive that is driven through its accessibility tree and the keyboard. The test fails when
+/// the program writes a warning or ends with an error.
 class Program {
 public:
     using Environment = std::map<std::string, std::string>;
@@ -26,24 +26,24 @@ public:
     {
         return _tree.all(matches);
     }
-    /// The visible buttons and rows whose names begin so, the frontmost last.
+    /// Answers the visible buttons and rows whose names begin so, the frontmost last.
     std::vector<Accessible> buttons(const std::string& beginning) const;
     bool shows(const std::string& beginning) const { return !buttons(beginning).empty(); }
-    /// Whether anything visible has exactly this name.
+    /// Answers whether a visible node has exactly this name.
     bool says(const std::string& name) const;
-    /// Whether the keyboard is at something whose name begins so.
+    /// Answers whether a node whose name begins so has the keyboard focus.
     bool hasKeyboardAt(const std::string& beginning) const;
-    /// The texts that a preview shows; empty: none.
+    /// Answers the texts that a preview shows; empty when it shows none.
     std::string document() const;
     std::vector<Accessible> entries() const;
-    /// The names of all that is visible and the end of the log, for the message of a test that fails.
+    /// Answers the names of all visible nodes and the end of the log, for the message of a failed test.
     std::string state() const;
     std::vector<Accessible> dialogs() const;
 
-    /// Presses the frontmost button whose name begins so, once it is there.
+    /// Presses the frontmost button whose name begins so, as soon as it exists.
     void press(const std::string& beginning) const;
-    /// Presses a button again and again until that has an effect: a press that meets a bar which still slides
-    /// in is lost with the button.
+    /// Presses a button again and again until that has an effect. A press on a bar that still slides in may
+    /// be lost with the button.
     void pressUntil(const std::string& beginning, const std::function<bool()>& effect) const;
 
     /// Runs a command of this build to its end, with the environment of the tests.
@@ -61,9 +61,9 @@ private:
 
 enum class Modifier { None, Control, Shift, ControlAndShift };
 
-/// A key that the person presses, as a symbol of the X server.
+/// Presses a key, given as a symbol of the X server.
 void pressKey(unsigned symbol, Modifier modifier = Modifier::None);
-/// Letters and digits that the person types.
+/// Types letters and digits.
 void type(const std::string& text);
 
 } // namespace e2e

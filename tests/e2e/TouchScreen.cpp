@@ -16,11 +16,11 @@ namespace e2e {
 
 namespace {
 
-constexpr std::uint16_t begin = 18, update = 19, end = 20; ///< of X's input extension
-constexpr double axisLength = 65535; ///< of the driver, for the whole display
-constexpr int step = 10; ///< milliseconds between two reports of a finger, as of real ones
+constexpr std::uint16_t begin = 18, update = 19, end = 20; ///< event types of X's input driver
+constexpr double axisLength = 65535; ///< length of the driver's axes for the whole display
+constexpr int step = 10; ///< milliseconds between two reports of a finger, as on a real touch screen
 constexpr int restSteps =
-    12; ///< of a finger that stands still before it leaves, so that nothing goes on moving
+    12; ///< a finger rests so long before it is lifted, so that the content does not go on moving
 
 template <typename Event>
 bool write(int socket, Event& event, std::uint32_t type)
@@ -36,7 +36,7 @@ bool read(int socket)
     return ::recv(socket, &response, sizeof response, MSG_WAITALL) == sizeof response;
 }
 
-/// Lets a finger's time pass: what it does is read from when it does it.
+/// Waits in real time, because the program measures the times of touches.
 void pass(int milliseconds)
 {
     bool isOver = false;

@@ -11,11 +11,11 @@
 
 namespace e2e {
 
-/// The touch screen of an X server of the tests: what its fingers do reaches the program as from a real one.
-/// Each call returns once the server has passed the event on.
+/// The touch screen of a test's X server. Its touches reach the program like those of a real one. Each call
+/// returns once the server has passed the event on.
 class TouchScreen {
 public:
-    /// `socket`: of the server's touch device. `width`, `height`: of its display.
+    /// `socket` is that of the server's touch device. `width` and `height` are the display's.
     TouchScreen(const std::string& socket, double width, double height);
     ~TouchScreen();
     TouchScreen(const TouchScreen&) = delete;
@@ -27,14 +27,15 @@ public:
     void lift(unsigned finger);
 
     void tap(Place place);
-    /// Puts one finger down for each path and draws them along at once, each from its first place to its
-    /// second. They stay down.
+    /// Puts one finger down for each path and moves all of them at once, each from its first place to its
+    /// second. The fingers stay down.
     struct Path {
         Place from, to;
     };
     void draw(const std::vector<Path>& paths, int milliseconds = 200);
     void liftAll();
-    /// A finger that draws and leaves the screen: at its last place, or, when it flicks, in full movement.
+    /// Moves a finger and lifts it. A drag rests at its last place before; a flick is lifted in full
+    /// movement.
     void drag(Path path, int milliseconds = 200);
     void flick(Path path);
 
@@ -43,7 +44,7 @@ private:
 
     int _socket = -1;
     double _width, _height;
-    std::vector<Place> _fingers; ///< where each was last
+    std::vector<Place> _fingers; ///< the last place of each finger
     std::vector<unsigned> _down;
 };
 

@@ -13,9 +13,9 @@
 namespace e2e {
 namespace {
 
-constexpr double width = 360, height = 720; ///< of the display
+constexpr double width = 360, height = 720; ///< size of the display
 
-/// All by fingers on a touch screen, in a window as small as a phone.
+/// Uses the program by touch alone, in a window as small as a phone.
 class TouchTests : public DriveTests {
 protected:
     void SetUp() override
@@ -32,13 +32,13 @@ protected:
         DriveTests::TearDown();
     }
 
-    /// The server takes one connection for its life.
+    /// The server takes one connection in its life, so all tests share it.
     static TouchScreen& screen()
     {
         static TouchScreen fingers(getenv("TRW_TOUCH_SOCKET"), width, height);
         return fingers;
     }
-    /// The middle of the frontmost button whose name begins so, once it stands still.
+    /// Answers the middle of the frontmost button whose name begins so, once it has stopped moving.
     Place placeOf(const std::string& beginning)
     {
         Place place;
@@ -76,7 +76,7 @@ TEST_F(TouchTests, AFingerThatMovesOpensNothingAndASwipeGoesBack)
     screen().put(1, placeOf("Tickets"));
     screen().lift(0);
     screen().lift(1);
-    // Begun and taken back: the screen stays.
+    // The swipe is begun and taken back, so the screen stays.
     screen().draw({{{x, y}, {x + 150, y}}});
     screen().move(0, {x, y});
     screen().lift(0);
@@ -132,7 +132,8 @@ TEST_F(TouchTests, FingersFillInAFormAndMarkATextThatIsSavedOnLeaving)
     };
     expectShown("Highlight");
     EXPECT_FALSE(canHighlight());
-    // The line of text, where a page as wide as the window has it. A finger that rests there selects.
+    // This is the height of the line of text in a page as wide as the window. A finger that rests there
+    // selects text.
     const double line = 482;
     screen().put(0, {80, line});
     ASSERT_TRUE(eventually(canHighlight));
@@ -209,7 +210,7 @@ TEST_F(TouchTests, AListMayChangeUnderAFinger)
     std::ofstream(top / "Desktop/A first one.txt") << "new";
     EXPECT_TRUE(eventually([&] { return placeOf("Packing list.md").y > place.y; }));
     screen().lift(0);
-    // What the finger was put on, wherever it is now.
+    // The document under the finger's first place opens, wherever the finger is now.
     EXPECT_TRUE(eventually([this] { return program->document().find("sweater") != std::string::npos; }));
 }
 

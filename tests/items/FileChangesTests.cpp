@@ -26,7 +26,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
-/// Does something at the moment at which a presenter of the item is asked to prepare for the change.
+/// Acts at the moment when a presenter of the item is asked to prepare for the change.
 class ActingPresenter : public platform::FilePresenter {
 public:
     ActingPresenter(Url url, std::shared_ptr<platform::OperationQueue> queue, std::function<void()> act)
@@ -73,7 +73,7 @@ protected:
         std::ifstream file(url.path());
         return {std::istreambuf_iterator<char>(file), {}};
     }
-    /// Nothing of the work on items is left over.
+    /// Checks that the operations on items left no temporary files.
     void expectNoTraces() const
     {
         for (const auto& entry : fs::recursive_directory_iterator(layout().home()))
@@ -145,7 +145,7 @@ TEST_F(FileChangesTest, RemovesWhatItWasAskedToAndNothingElse)
     EXPECT_FALSE(isThere(content));
     EXPECT_EQ(contentOf(kept), "precious");
     expectNoTraces();
-    // Nothing there has no date, so nothing says that it is unchanged.
+    // A missing file has no date, so nothing shows that it is unchanged.
     EXPECT_THAT(FileUtils::remove(file), HasCode(FileErrorCode::Cancelled));
 }
 
@@ -246,7 +246,7 @@ TEST_F(FileChangesTest, AFolderSwappedForALinkLeadsNowhere)
     };
     const auto document = writeDocument("from/a.txt", "a"), free = writeDocument("b.txt", "b");
     const auto target = makeFolder("to");
-    // The outside file looks the same, so that only the link is in the way.
+    // The outside file has the same date, so that only the link is in the way.
     fs::last_write_time(kept.path(), fs::last_write_time(document.path()));
 
     const auto mover = whenAsked(free, [&] { swap(target); });
@@ -259,7 +259,7 @@ TEST_F(FileChangesTest, AFolderSwappedForALinkLeadsNowhere)
     EXPECT_EQ(contentOf(free), "b");
 }
 
-/// Everything below a folder by its path, with its content or target.
+/// Answers everything below a folder by its path, with its content or target.
 std::map<std::string, std::string> everything(const std::string& folder)
 {
     std::map<std::string, std::string> found;
@@ -323,7 +323,7 @@ TEST_F(FileChangesTest, NamesThatDifferByAnyByteAreItemsOfTheirOwn)
         {"invalid bytes", "bad\xff.txt", "bad\xfe.txt"},
         {"255 bytes", std::string(255, 'n'), std::string(254, 'n') + 'N'}};
     for (const auto& [name, from, to] : rows) {
-        // A name that is no UTF-8 exists on the disk, however it came there.
+        // A name that is not UTF-8 can exist on the disk, however it came there.
         const auto source = at(from), target = at(to);
         writeFile(source.path(), "first");
         EXPECT_FALSE(FileUtils::moveTo(source, target)) << name;
@@ -341,14 +341,14 @@ TEST_F(FileChangesTest, WithoutPermissionAllStaysAsItIs)
 {
     makeFolder("closed/sub");
     const auto file = writeDocument("closed/sub/a.txt", "a"), folder = at("closed");
-    // In whatever order they are met: none may go before it is known that all can.
+    // The folder is read in any order, so nothing may be deleted before it is known that everything can be.
     for (const auto& name : {"b", "c", "d", "e", "f", "g"})
         writeDocument(std::string("closed/") + name, name);
     const auto before = everything(layout().documents());
     const auto sub = file.deletingLastPathComponent();
     const auto child = ::fork();
     if (child == 0) {
-        // Root may do anything, so another user owns the drive and does it.
+        // Root may do anything, so another user owns the drive and runs the operation.
         constexpr unsigned nobody = 65534;
         if (::geteuid() == 0) {
             for (const auto& entry : fs::recursive_directory_iterator(DriveFixture::folder().path()))

@@ -16,7 +16,7 @@ using testing_support::SimulatedApps;
 
 class LaunchUtilsTest : public ItemsFixture {
 protected:
-    /// The identifier of the app that a document is opened in; "" for none.
+    /// Answers the identifier of the app that opens a document; "" for none.
     static std::string appFor(const Url& url, bool requireOpenIn = true)
     {
         const auto app = LaunchUtils::defaultAppForDocumentRequireOpenIn(url, requireOpenIn);

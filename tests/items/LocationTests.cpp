@@ -74,7 +74,7 @@ TEST_F(LocationTest, SaysWhyALocationCannotBeSplit)
     EXPECT_FALSE(container);
     EXPECT_THAT(log->lines(), testing::Contains(testing::StartsWith("WARNING Split URL: ")));
 
-    // Above the folder of the container's documents.
+    // This location lies above the container's documents folder.
     const auto error = split(sketches.deletingLastPathComponent());
     ASSERT_TRUE(error);
     EXPECT_TRUE(error->is(FileErrorCode::Formatting));

@@ -19,7 +19,7 @@ using List = std::shared_ptr<DocumentListController>;
 
 class MenuEnableChecksTest : public ItemsFixture {
 protected:
-    /// A list that was shown, in edit mode, with these of its items selected.
+    /// Answers a list that was shown, in edit mode, with these of its items selected.
     List shown(const List& list, const std::vector<Url>& selection = {}) const
     {
         list->view();

@@ -15,7 +15,7 @@ namespace {
 
 class ThumbnailTest : public ItemsFixture {
 protected:
-    /// Lets every item have these thumbnails, and counts how often they are asked for.
+    /// Gives every item these thumbnails, and counts the requests for them.
     void provide(ThumbnailMap map)
     {
         decorated->decoratedItems.changePromised = [this, map = std::move(map)](

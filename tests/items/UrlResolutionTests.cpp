@@ -76,7 +76,7 @@ TEST_F(UrlResolutionTest, OffersOtherContainersOnlyWhereTheFirstItemMayGo)
 
 class DocumentIdentifierTest : public ItemsFixture {
 protected:
-    /// The identifier of a document, as text.
+    /// Answers the identifier of a document as text.
     std::string identify(const Url& url) const
     {
         return std::to_string(DriveFixture::cloud->documentIdentifiers().identify(url).value.value_or(0));

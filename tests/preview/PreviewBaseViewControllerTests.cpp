@@ -25,7 +25,7 @@ constexpr kit::TraitCollection phone{kit::SizeClass::Compact, kit::SizeClass::Re
 constexpr kit::TraitCollection lying{kit::SizeClass::Compact, kit::SizeClass::Compact};
 constexpr kit::TraitCollection tablet{kit::SizeClass::Regular, kit::SizeClass::Regular};
 
-/// A screen with a button that opens the item elsewhere.
+/// A screen with a button that opens the item in another app.
 class ScreenWithButton : public PreviewBaseViewController {
 public:
     std::shared_ptr<kit::Button> openInAppNavControllerButton() override { return button; }

@@ -97,7 +97,7 @@ protected:
         std::ifstream file(url.path(), std::ios::binary);
         return {std::istreambuf_iterator<char>(file), {}};
     }
-    /// What the first field of a document on the disk holds.
+    /// Answers the content of the first field of a document on the disk.
     static std::string written(const Url& url)
     {
         const auto opened = services().pagedDocumentOpener().openForEditing(
@@ -115,7 +115,7 @@ TEST_F(PreviewEditingTest, OffersItWhereDelegateAndDocumentAllowItAndSaysWhyNotO
     EXPECT_TRUE(isOffered());
     show("text", "Notes.txt");
     EXPECT_FALSE(isOffered());
-    // The content is one, but not the name, which the delegate goes by.
+    // The content is a PDF document but the name is not one, and the delegate decides by the name.
     show(formPdf(), "Form.ai");
     EXPECT_FALSE(preview->canEdit());
 
@@ -154,7 +154,7 @@ TEST_F(PreviewEditingTest, SavesWhenThePersonIsDoneAndGoesOnShowingThePlace)
     EXPECT_FALSE(preview->screenView()->toolbar()->isHidden());
     EXPECT_EQ(written(item), "Ada");
 
-    // The presenter hears of the save, but what is shown is that very content.
+    // The presenter is told of the save, but the content on the screen is the saved one.
     const auto shown = preview->content();
     drive.dispatch->advance(3);
     EXPECT_EQ(preview->content(), shown);

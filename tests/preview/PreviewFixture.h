@@ -35,8 +35,8 @@ protected:
     {
         return tarrow::DRItem::initWithURL(drive.writeDocument(name, "content of " + std::string(name)));
     }
-    /// The last names of the shown folders, "*" for the quick preview, "i" for a details screen,
-    /// "-" for another one.
+    /// Answers the last names of the shown folders, "*" for the quick preview, "i" for a details screen and
+    /// "-" for another screen.
     std::vector<std::string> stack() const
     {
         std::vector<std::string> names;
@@ -52,11 +52,9 @@ protected:
         return names;
     }
 
-    std::shared_ptr<kit::NavigationController> navigation =
-        std::make_shared<kit::NavigationController>();
+    std::shared_ptr<kit::NavigationController> navigation = std::make_shared<kit::NavigationController>();
     std::shared_ptr<kit::ViewController> base = std::make_shared<kit::ViewController>();
-    std::shared_ptr<kit::Window> window =
-        std::make_shared<kit::Window>(platform::Rect{0, 0, 360, 640});
+    std::shared_ptr<kit::Window> window = std::make_shared<kit::Window>(platform::Rect{0, 0, 360, 640});
     std::shared_ptr<tarrow::PreviewItemManager> manager =
         tarrow::PreviewItemManager::newItemManagerWithModeNavController(tarrow::PreviewModeQuick, navigation);
     std::shared_ptr<tarrow::LookwellItemController> preview =

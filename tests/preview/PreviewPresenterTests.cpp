@@ -18,17 +18,17 @@
 
 using namespace platform;
 using namespace tarrow;
-using screens::MoveTargetPicker;
 using kit::AlertController;
+using screens::MoveTargetPicker;
 using testing::ElementsAre;
 using testing::HasSubstr;
 
 namespace {
 
-/// What others, and its own buttons, do to the previewed document.
+/// Other programs and the preview's own buttons change the previewed document.
 class Presenter : public testing_support::PreviewFixture {
 protected:
-    /// Previews a document and lets everything that follows come to rest.
+    /// Previews a document and runs everything that follows.
     Url preview(const char* name, int mode = PreviewModeQuick)
     {
         const auto item = document(name);
@@ -165,7 +165,7 @@ TEST_F(Presenter, FollowsAMove)
         1U);
     EXPECT_EQ(navigation->viewControllers(), screens);
 
-    // The folder above takes the document along.
+    // The folder above is moved with the document in it.
     EXPECT_FALSE(FileUtils::moveTo(drive.url("Documents/Trip"), drive.url("Desktop/Tour")));
     drive.settle();
     EXPECT_THAT(stack(), ElementsAre(top(), "Desktop", "Tour", "*"));

@@ -43,7 +43,7 @@ protected:
         platform::installLogSink(nullptr);
     }
 
-    /// What the caller does with a name: keeps it, and answers as the test wants.
+    /// The caller's callback records a name and answers as the test wants.
     FilenamePrompt::ValidateNewFilenameCallback callback()
     {
         return [this](const std::string& name, bool& accepted) {
@@ -68,7 +68,7 @@ protected:
     void type(const std::string& text) const { field().userEdited(text, {text.size(), 0}); }
     bool pressDone() const { return alert->press(1); }
     bool isOpen() const { return root->presentedViewController() == alert; }
-    /// The red message; nothing while its area is hidden.
+    /// Answers the red message, or nothing while its area is hidden.
     std::optional<std::string> message() const
     {
         const auto area = std::static_pointer_cast<SimpleTextViewController>(alert->contentViewController());
@@ -79,8 +79,7 @@ protected:
 
     std::shared_ptr<testing_support::RecordingLog> log = testing_support::RecordingLog::install();
     std::shared_ptr<ViewController> root = std::make_shared<ViewController>();
-    std::shared_ptr<kit::Window> window =
-        std::make_shared<kit::Window>(platform::Rect{0, 0, 400, 800});
+    std::shared_ptr<kit::Window> window = std::make_shared<kit::Window>(platform::Rect{0, 0, 400, 800});
     std::shared_ptr<FilenamePrompt> prompt;
     std::shared_ptr<kit::AlertController> alert;
     std::vector<std::string> confirmed;

@@ -21,8 +21,8 @@ namespace tarrow {
 namespace {
 
 using namespace testing_support;
-using screens::DocumentListController;
 using kit::SystemItem;
+using screens::DocumentListController;
 
 struct CountingDelegate : DocumentListControllerStatusBarDelegate {
     int presses = 0;
@@ -51,7 +51,7 @@ protected:
 
     DriveStatusLabelView& view() { return *bar->labelsView(); }
     screens::StorageUpgradeButton& button() { return *view().quotaButton(); }
-    /// The frame of the line in a view of this size.
+    /// Answers the frame of the line in a view of this size.
     platform::Rect lineIn(double width, double height)
     {
         view().setFrame({0, 0, width, height});

@@ -32,7 +32,7 @@ struct CountingSheetDelegate : DocumentInteractionSheetDelegate {
 
 class DocumentInteraction : public ComponentsFixture {
 protected:
-    /// Shows the menu of an item; what it offers.
+    /// Shows the menu of an item and answers its lines.
     Lines offeredFor(const Url& url)
     {
         sheet = DocumentInteractionSheet::interactionControllerWithURL(url);

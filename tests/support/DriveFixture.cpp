@@ -46,7 +46,7 @@ void writeFile(const std::string& path, std::string_view content)
 
 const std::shared_ptr<host::system::MimeTypeRegistry>& types()
 {
-    // One for the process: it reads the system's type database and answers from memory.
+    // The process has one registry, because it reads the system's type database and answers from memory.
     static const auto registry = std::make_shared<host::system::MimeTypeRegistry>();
     return registry;
 }
@@ -71,7 +71,7 @@ DriveFixture::DriveFixture()
     platform::ServiceSet set;
     set.dispatch = dispatch;
     set.notificationCenter = notifications;
-    // Presenters answer on queues that only this thread drives.
+    // Presenters answer on queues that only this thread runs.
     fileCoordinator =
         std::make_shared<host::system::LocalFileCoordinator>(host::system::LocalFileCoordinator::Settings{
             .lockFile = layout.coordination(), .beforeWaiting = [queues = std::weak_ptr(dispatch)] {

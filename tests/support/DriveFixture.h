@@ -20,8 +20,8 @@
 namespace testing_support {
 
 /// A drive in a temporary folder, with an account signed in and the host's real services installed, on queues
-/// and a clock that the test drives. Relative paths below start at the drive's top level
-/// ("Documents/Notes.txt"); folders that lead to a file are made.
+/// and a clock that the test controls. Relative paths below start at the drive's top level
+/// ("Documents/Notes.txt"). Folders above a file are made.
 class DriveFixture {
 public:
     DriveFixture();
@@ -35,24 +35,24 @@ public:
     platform::Url url(std::string_view relativePath) const;
     platform::Url writeDocument(std::string_view relativePath, std::string_view content = "content") const;
     platform::Url makeFolder(std::string_view relativePath) const;
-    /// Writes the promise of an item; answers the item's logical location.
+    /// Writes the promise of an item. Answers the item's logical location.
     platform::Url writePromise(
         std::string_view relativePath, const host::drive::PromiseRecord& promise) const;
     platform::Url writeLink(std::string_view relativePath, const std::string& target) const;
-    /// A reference ("....trwref") to a document of a container.
+    /// Writes a reference ("....trwref") to a document of a container.
     platform::Url writeReference(
         std::string_view relativePath, const std::string& container, const std::string& path) const;
-    /// An alias ("....trwalias") of a path below the documents area, or of an absolute one.
+    /// Writes an alias ("....trwalias") of a path below the documents area, or of an absolute path.
     platform::Url writeAlias(std::string_view relativePath, const std::string& target) const;
-    /// Makes a container; answers its documents folder.
+    /// Makes a container. Answers its documents folder.
     platform::Url makeContainer(
         const std::string& identifier, const host::drive::ContainerRecord& description = {}) const;
-    /// Sets an extended attribute; the names are in host::drive::itemMark.
+    /// Sets an extended attribute. The names are in host::drive::itemMark.
     void mark(const platform::Url& url, const char* attribute, std::string_view value) const;
 
     void signIn(const std::string& name) const;
     void signOut() const;
-    /// Hears of what changed on disk so far and runs all work that is due.
+    /// Delivers the notices of changes on disk so far and runs all work that is due.
     void settle() const;
 
     const std::shared_ptr<RecordingLog> log = RecordingLog::install();
@@ -64,11 +64,11 @@ private:
     TemporaryDirectory _folder;
 
 public:
-    /// The service under the installed set's cloudDocumentService.
+    /// The service behind the installed set's cloudDocumentService.
     std::shared_ptr<host::drive::LocalCloudDocumentService> cloud;
-    /// The installed set's activityHandOver: this device.
+    /// The installed set's activityHandOver, which is this device's.
     std::shared_ptr<host::drive::LocalActivityHandOver> handOver;
-    /// The installed set's fileCoordinator; what presenters are asked runs before the writer waits.
+    /// The installed set's fileCoordinator. The presenters' work runs before the writer waits.
     std::shared_ptr<platform::FileCoordinator> fileCoordinator;
 };
 

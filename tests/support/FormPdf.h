@@ -9,10 +9,10 @@
 
 namespace testing_support {
 
-/// A PDF document of two pages of 200 by 300 points with an index. The first one has the text "Hello
-/// wonderful" and a form: a name (called "Your name"), a box, a choice of three towns, two buttons of which
-/// the first is pressed, a field that must not be changed, one that nobody sees, and a note by somebody else.
-/// The second one has a field for several lines.
+/// Answers a PDF document of two pages of 200 by 300 points with an index. The first page has the text "Hello
+/// wonderful" and a form: a name (called "Your name"), a check box, a choice of three towns, two radio
+/// buttons of which the first is pressed, a field that must not be changed, a hidden field, and a note by
+/// another person. The second page has a field for several lines.
 inline std::string formPdf(const std::string& trailer = {})
 {
     const std::string widget = "<</Type/Annot/Subtype/Widget/P 4 0 R";

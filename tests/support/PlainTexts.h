@@ -7,7 +7,7 @@
 
 namespace testing_support {
 
-/// No catalogue: every text is its key.
+/// A localization without a catalogue: every text is its key.
 class PlainTexts : public platform::Localization {
 public:
     std::string text(const std::string& key) const override { return key; }

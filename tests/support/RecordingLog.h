@@ -12,7 +12,7 @@
 
 namespace testing_support {
 
-/// Keeps every log line, private values shown, while it is installed. Any thread may log.
+/// Keeps every log line, with private values, while it is installed. Any thread may log.
 class RecordingLog : public platform::LogSink {
 public:
     /// Makes a log and installs it as the process's sink, at the lowest level.
@@ -21,9 +21,10 @@ public:
     void write(const platform::LogLine& line) override;
     void openActivity(std::string_view label) override;
 
-    /// The messages so far, each as "LEVEL message" ("DEBUG ...", "INFO ...", "WARNING ...", "ERROR ...").
+    /// Answers the messages so far, each as "LEVEL message" ("DEBUG ...", "INFO ...", "WARNING ...", "ERROR
+    /// ...").
     std::vector<std::string> lines() const;
-    /// Whether a line is there, and how often, by its level and whole message.
+    /// Answers how often a line was logged, by its level and whole message.
     std::size_t count(std::string_view line) const;
     std::vector<std::string> activities() const;
     void clear();

@@ -10,7 +10,7 @@
 
 namespace testing_support {
 
-/// Writes down what is handed to other programs; `answer` is what each of them answers at once.
+/// Records what is handed to other programs. Each of them answers `answer` at once.
 class RecordingSharing : public platform::DocumentSharing {
 public:
     void copyText(const std::string& text) override { lines.push_back("copy " + text); }

@@ -8,8 +8,8 @@
 
 namespace testing_support {
 
-/// A PDF document with a line of text on each page of 200 by 300 points, 50 points from the left and 200 from
-/// the bottom. It has no index: readers make one.
+/// Answers a PDF document with a line of text on each page of 200 by 300 points, 50 points from the left and
+/// 200 from the bottom. It has no index, so readers rebuild one.
 inline std::string simplePdf(const std::vector<std::string>& pages, const std::string& trailer = {})
 {
     std::string objects = "%PDF-1.4\n1 0 obj<</Type/Catalog/Pages 2 0 R>>endobj\n"
@@ -27,7 +27,7 @@ inline std::string simplePdf(const std::vector<std::string>& pages, const std::s
     return objects + "trailer<</Root 1 0 R" + trailer + ">>\n%%EOF\n";
 }
 
-/// One that opens with a password only.
+/// Answers a PDF document that opens only with a password.
 inline std::string passwordPdf()
 {
     const std::string hash(64, '1');

@@ -11,7 +11,7 @@
 
 namespace testing_support {
 
-/// Apps that the test chooses; none at first.
+/// Apps that the test chooses; there are none at first.
 class SimulatedApps : public platform::AppRegistry {
 public:
     struct Opened {
@@ -20,9 +20,9 @@ public:
         bool operator==(const Opened&) const = default;
     };
 
-    std::vector<platform::RankedApps> available; ///< for every document
+    std::vector<platform::RankedApps> available; ///< the apps for every document
     std::vector<platform::AppHandle> known;
-    bool appsStart = true; ///< whether an app that is to open something does
+    bool appsStart = true; ///< whether an app starts when it is asked to open something
     std::vector<Opened> opened;
 
     static platform::AppHandle make(const std::string& identifier, bool supportsOpenInPlace = true)

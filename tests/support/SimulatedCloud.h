@@ -11,8 +11,8 @@
 
 namespace testing_support {
 
-/// An account whose token and quota answers the test chooses, over the documents of another service. Without
-/// such a service only the account may be asked for.
+/// An account whose token and quota the test chooses, over the documents of another service. Without such a
+/// service only the account works.
 class SimulatedCloud : public platform::CloudDocumentService, public platform::CloudAccount {
 public:
     explicit SimulatedCloud(std::shared_ptr<platform::CloudDocumentService> documents = nullptr)
@@ -23,7 +23,7 @@ public:
     std::optional<platform::PropertyValue> token = platform::PropertyValue("account-1");
     platform::Result<std::int64_t> quota = std::int64_t{1000};
     mutable int requests = 0;
-    std::function<void()> beforeAnswer; ///< called while a quota request is out
+    std::function<void()> beforeAnswer; ///< called while a quota request is pending
 
     platform::CloudAccount& account() override { return *this; }
     platform::PromisedItems& promisedItems() override { return _documents->promisedItems(); }

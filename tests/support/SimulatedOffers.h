@@ -10,7 +10,7 @@ namespace testing_support {
 /// Storage offers that the test chooses.
 class SimulatedOffers : public platform::StorageOfferManager {
 public:
-    bool fetchStarts = false; ///< whether asking for the offer starts a fetch
+    bool fetchStarts = false; ///< whether a request for the offer starts a fetch
     std::shared_ptr<const platform::StorageOffer> offer;
     bool hasDefaultAction = false;
     int performedActions = 0;

@@ -14,7 +14,7 @@ TemporaryDirectory::TemporaryDirectory()
     auto pattern = (std::filesystem::temp_directory_path() / "tarrow-test-XXXXXX").string();
     if (!mkdtemp(pattern.data()))
         throw std::runtime_error("cannot make a temporary folder");
-    // Resolved, so that paths compare equal to what the file system answers.
+    // The path is canonical, so that it compares equal to the file system's answers.
     _path = std::filesystem::canonical(pattern);
 }
 

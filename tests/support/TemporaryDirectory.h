@@ -9,7 +9,7 @@
 
 namespace testing_support {
 
-/// A folder of its own for one test, removed with everything in it at the end.
+/// A folder for one test, which is removed with everything in it at the end.
 class TemporaryDirectory {
 public:
     TemporaryDirectory();
@@ -18,9 +18,9 @@ public:
     TemporaryDirectory& operator=(const TemporaryDirectory&) = delete;
 
     const std::filesystem::path& path() const { return _path; }
-    /// The path of something below the folder.
+    /// Answers the path of an item below the folder.
     std::string at(std::string_view name) const { return (_path / name).string(); }
-    /// Writes a file below the folder, making the folders that lead to it; answers its path.
+    /// Writes a file below the folder, and makes the folders above it. Answers its path.
     std::string write(std::string_view name, std::string_view content) const;
 
 private:

@@ -102,7 +102,7 @@ std::shared_ptr<platform::OperationQueue> VirtualDispatch::makeOperationQueue(
 
 void VirtualDispatch::after(Duration delay, const std::shared_ptr<platform::Queue>& queue, Work work)
 {
-    // The delay holds the queue, as the host's does.
+    // The delay keeps the queue alive, as the host's does.
     submit(delay, weak_from_this(), [queue, work = std::move(work)] { work(); });
 }
 
@@ -168,7 +168,7 @@ void VirtualDispatch::advance(double seconds)
 
 void VirtualDispatch::end()
 {
-    // What is dropped may add work while it ends, so not under the lock.
+    // The dropped work is destroyed outside the lock, because it may add work while it is destroyed.
     std::vector<Pending> dropped;
     {
         const std::lock_guard lock(_mutex);

@@ -14,7 +14,7 @@
 namespace testing_support {
 
 /// Queues and timers on a clock that only the test moves. Work of every queue runs on the thread that drives
-/// it, in the order of due times and, within one moment, of submission. Work may be added from any thread.
+/// it, in the order of due times and, within one moment, of submission. Any thread may add work.
 class VirtualDispatch : public platform::Dispatch, public std::enable_shared_from_this<VirtualDispatch> {
 public:
     static std::shared_ptr<VirtualDispatch> create() { return std::make_shared<VirtualDispatch>(); }
@@ -30,16 +30,17 @@ public:
         platform::Duration period, platform::Duration leeway, platform::Work handler) override;
     platform::Date now() const override;
 
-    /// Runs what is due now, and what that adds for now, until nothing is left.
+    /// Runs the work that is due now, and the work that it adds for now, until nothing is left.
     void runUntilIdle();
-    /// Moves the clock by seconds, running what falls due on the way at its own time.
+    /// Moves the clock by seconds, and runs work that falls due on the way at its own time.
     void advance(double seconds);
-    /// Drops all work that waits, and all that is added from now on: what it holds may hold the queues.
+    /// Drops all waiting work and all that is added from now on, because work may hold the queues that hold
+    /// it.
     void end();
-    /// How many pieces of work wait, timers included.
+    /// Answers how many pieces of work wait, timers included.
     std::size_t pendingCount() const;
 
-    /// Adds work that is dropped when the queue that it waits for is destroyed first.
+    /// Adds work that is dropped when the queue for which it waits is destroyed first.
     void submit(platform::Duration delay, std::weak_ptr<const void> queue, platform::Work work);
 
 private:

@@ -19,8 +19,8 @@
 
 namespace testing_support {
 
-using screens::DocumentListController;
 using kit::Window;
+using screens::DocumentListController;
 
 namespace {
 
@@ -30,7 +30,7 @@ std::shared_ptr<platform::Localization> englishTexts()
         TRW_LOCALE_FOLDER, host::system::UserLocale{"en", "en_US"});
 }
 
-/// A service of a set that somebody else keeps.
+/// Answers a service of a set without owning it.
 template <typename T>
 std::shared_ptr<T> borrowed(T& service)
 {

@@ -29,8 +29,8 @@ class Window;
 
 namespace testing_support {
 
-/// A browser in a window, on the real store in a temporary folder. Only the account's token, the quota,
-/// the storage offers and other apps are simulated, and the clock.
+/// A browser in a window, on the real store in a temporary folder. Only the account's token, the quota, the
+/// storage offers, other apps and the clock are simulated.
 class BrowserFixture : public testing::Test {
 protected:
     using List = std::shared_ptr<screens::DocumentListController>;
@@ -38,12 +38,12 @@ protected:
     BrowserFixture();
     ~BrowserFixture() override;
 
-    /// Makes a new browser and shows it; its root list has reported its contents.
+    /// Makes a new browser, shows it and waits until its root list has reported its contents.
     void launch();
     void launchWithoutListing();
-    /// Runs everything that is due now.
+    /// Runs all work that is due now.
     void settle() { drive.settle(); }
-    /// Posts a notice and runs what it leads to.
+    /// Posts a notification and runs the work that follows.
     void post(platform::Notification notice);
 
     platform::Url url(std::string_view relativePath) const { return drive.url(relativePath); }
@@ -53,11 +53,11 @@ protected:
     }
     static platform::UserDefaults& defaults() { return platform::services().userDefaults(); }
     List topList() const { return browser->getTopDocumentListController(); }
-    /// The last names of the folders that the stack shows, "*" for a quick preview,
-    /// "i" for a details screen and "-" for another one.
+    /// Answers the last names of the folders in the stack, "*" for a quick preview, "i" for a details screen
+    /// and "-" for another screen.
     std::vector<std::string> stack() const;
     std::shared_ptr<kit::AlertController> alert() const;
-    /// The text of a number of items, as the catalogue has it.
+    /// Answers the catalogue's text for a number of items.
     static std::string itemsText(std::size_t count);
 
     DriveFixture drive;

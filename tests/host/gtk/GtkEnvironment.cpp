@@ -44,7 +44,7 @@ GLogWriterOutput recordLog(GLogLevelFlags level, const GLogField* fields, gsize 
     return G_LOG_WRITER_HANDLED;
 }
 
-/// An X server without a screen for this process alone, and the toolkit on it.
+/// Starts an X server without a screen for this process alone, and opens the toolkit on it.
 class DisplayEnvironment : public ::testing::Environment {
 public:
     void SetUp() override
@@ -63,7 +63,7 @@ public:
         g_log_set_writer_func(recordLog, nullptr, nullptr);
         ASSERT_TRUE(gtk_init_check());
         adw_init();
-        takeToolkitWarnings(); // of a machine without a session
+        takeToolkitWarnings(); // about a machine without a session
     }
 
     void TearDown() override

@@ -8,7 +8,7 @@
 
 namespace testing_support {
 
-/// The warnings that the toolkit and its libraries have written since the last call.
+/// Answers the warnings that the toolkit and its libraries have written since the last call.
 std::vector<std::string> takeToolkitWarnings();
 
 } // namespace testing_support

@@ -17,7 +17,7 @@ using host::gtk::HandOverToasts;
 using platform::UserActivity;
 using Activity = std::shared_ptr<const UserActivity>;
 
-/// A window of this device, and another device of the account on the same real drive.
+/// A window of this device, and another device of the account on the same drive.
 class HandOverToastsTest : public testing_support::WindowFixture {
 protected:
     void SetUp() override

@@ -17,7 +17,7 @@ using testing_support::makeScreen;
 
 class PeerTests : public testing_support::WindowFixture {
 protected:
-    /// Shows a screen with this view at a frame.
+    /// Shows a screen that contains this view at a frame.
     std::shared_ptr<kit::View> showOne(const std::shared_ptr<kit::View>& view, const Rect& frame)
     {
         const auto screen = makeScreen("");
@@ -94,12 +94,12 @@ TEST_F(PeerTests, APressReachesTheActionOnlyWhileTheButtonIsEnabled)
     button->setEnabled(false);
     settle();
     EXPECT_FALSE(gtk_widget_is_sensitive(nativeOf(*button)));
-    // A finger is larger than the button.
+    // A touch above the small button still belongs to it, because a finger is larger.
     EXPECT_TRUE(gtk_widget_contains(nativeOf(*button), 40, -10));
     EXPECT_FALSE(gtk_widget_contains(nativeOf(*button), 40, -13));
 }
 
-/// Refuses digits.
+/// Refuses edits with digits.
 class NoDigits : public kit::TextFieldDelegate {
 public:
     bool textFieldShouldChangeCharactersInRangeReplacementString(
@@ -159,7 +159,7 @@ TEST_F(PeerTests, NothingThatHasEndedIsCalled)
     show(screen);
     auto* native = GTK_WIDGET(g_object_ref(nativeOf(*button)));
 
-    // The view ends; its widget is pressed before the next frame.
+    // The view is destroyed, and its widget is pressed before the next frame.
     button->setTitle("Changed");
     button->removeFromSuperview();
     button.reset();
@@ -168,7 +168,7 @@ TEST_F(PeerTests, NothingThatHasEndedIsCalled)
     g_signal_emit_by_name(native, "clicked");
     g_object_unref(native);
 
-    // The window ends with a change still waiting; the view lives on.
+    // The window closes with a change still pending, and the view lives on.
     label->setText("Changed");
     host->close();
     label->setText("Again");

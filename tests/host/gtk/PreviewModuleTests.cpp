@@ -23,7 +23,7 @@ using screens::PreviewView;
 
 struct BadModule {
     const char* name;
-    const char* contentOf; ///< a file whose content the module has; empty: there is none
+    const char* contentOf; ///< the file whose content the module gets; empty: there is no module
 };
 
 void PrintTo(const BadModule& row, std::ostream* stream)

@@ -97,12 +97,12 @@ TEST_F(PreviewViewTests, APictureFitsAndIsZoomedAroundItsMiddle)
     EXPECT_NEAR(
         gtk_adjustment_get_value(across(*view)), (shownWidth - width) / 2, 4); // margins are whole points
 
-    // Sharper pixels of the same picture change neither place nor zoom.
+    // A finer picture of the same document changes neither the place nor the zoom.
     view->setPicture(picture(3000, 6000, 3000));
     settle();
     EXPECT_NEAR(gtk_adjustment_get_value(down(*view)), 1.5 * height, 1);
     EXPECT_EQ(view->zoom(), 4);
-    // It has all the pixels of its file.
+    // The picture has all the pixels of its file.
     EXPECT_EQ(asked, 0);
     view->setPicture(picture(300, 600, 3000));
     view->setZoom(6);
@@ -140,7 +140,7 @@ TEST_F(PreviewViewTests, PagesKeepTheirPlaceThroughZoomAndChanges)
     view->goToPage(39);
     settle();
     EXPECT_EQ(view->currentPage(), 39U);
-    // Shorter than the place that is shown.
+    // The new document ends before the place that was shown.
     view->setDocument(document(2, "Third.pdf"), {200, 300});
     settle();
     EXPECT_EQ(view->currentPage(), 1U);
@@ -168,7 +168,7 @@ TEST_F(PreviewViewTests, ALongTextComesInPiecesAndKeepsItsPlace)
     settle();
     waitFor([&] { return gtk_adjustment_get_value(down(*view)) > 3'000; }, "the way to the match");
 
-    // It grows at its end and changes in the middle while it is shown.
+    // The text grows at its end and changes in the middle while it is shown.
     GtkTextIter start, end;
     gtk_text_buffer_get_selection_bounds(buffer, &start, &end);
     const auto line = gtk_text_iter_get_line(&start);
@@ -184,7 +184,7 @@ TEST_F(PreviewViewTests, ALongTextComesInPiecesAndKeepsItsPlace)
     gtk_text_buffer_get_selection_bounds(buffer, &start, &end);
     EXPECT_EQ(gtk_text_iter_get_line(&start), line);
 
-    // Changed again before it was all there, and emptied.
+    // The text changes again before all of it was inserted, and is then emptied.
     view->setText({text + text, "Notes.txt", false});
     view->setText({"short", "Notes.txt", false});
     waitFor([&] { return length() == 5; }, "the short text");
@@ -225,7 +225,7 @@ TEST_F(PreviewViewTests, ADamagedRecordingIsSaidToBe)
     EXPECT_THAT(words, testing::AnyOf(testing::HasSubstr("damaged"), testing::HasSubstr("cannot play")));
 }
 
-/// The widget has others, for itself alone.
+/// The widget also has shortcut controllers for itself alone.
 bool isWindowWide(gpointer controller)
 {
     return GTK_IS_SHORTCUT_CONTROLLER(controller)
@@ -256,7 +256,7 @@ TEST_F(PreviewViewTests, TheKeysOfTheWindowReachTheDocument)
     g_object_unref(controllers);
     EXPECT_GE(shortcuts, 4);
     EXPECT_EQ(finds, 1);
-    // Larger, smaller, and back to where it fits.
+    // The keys enlarged it, made it smaller and brought it back to the fitting size.
     EXPECT_EQ(view->zoom(), 1);
 }
 

@@ -27,7 +27,7 @@ protected:
     }
     ~Printing() override { platform::installServices({}); }
 
-    /// The pages that come out when a document is printed into a file; -1 when it cannot be.
+    /// Answers the number of pages when a document is printed into a file, or -1 when it cannot be printed.
     int printed(const std::string& name, PrintableKind kind) const
     {
         const auto pages =

@@ -62,7 +62,7 @@ TEST_F(NavigationTests, ASwipeTakesTheModelAlong)
 {
     const auto first = makeScreen("First"), second = makeScreen("Second");
     const auto stack = showStack({first, second});
-    // What a swipe does: the leaflet goes back by itself.
+    // A swipe makes the leaflet go back by itself, as this call does.
     EXPECT_TRUE(adw_leaflet_navigate(navigationPeer().leaflet(), ADW_NAVIGATION_DIRECTION_BACK));
     settle();
     EXPECT_EQ(stack->topViewController(), first);
@@ -126,7 +126,7 @@ TEST_F(AlertTests, AnAlertMayRefuseToClose)
     EXPECT_GE(gtk_widget_get_height(peerOf(*field)->widget()), 44);
     gtk_editable_set_text(GTK_EDITABLE(entry), "Plans");
     EXPECT_EQ(field->text(), "Plans");
-    // What lies below takes no focus while the alert stands.
+    // The screen below takes no focus while the alert is shown.
     EXPECT_FALSE(gtk_widget_grab_focus(peer().rootPeer()->widget()));
 
     create->setEnabled(false);
@@ -264,7 +264,8 @@ protected:
         return host::gtk::ListRowWidget::shown(row) == wanted
             && host::gtk::ListRowWidget::titleText(row) == wanted.title;
     }
-    /// Every row widget that is seen shows what the model has at its place, and soon all that exist do.
+    /// Checks that every visible row widget shows the model's row at its place, and soon all existing ones
+    /// do.
     void expectRowsMatch()
     {
         EXPECT_FALSE(listPeer().liveRows().empty());

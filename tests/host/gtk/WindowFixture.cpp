@@ -111,7 +111,7 @@ void WindowFixture::settle()
     auto* clock = gtk_widget_get_frame_clock(windowWidget());
     if (!clock)
         return;
-    // What a frame shows may schedule more for the next one; three come to rest.
+    // A frame may schedule work for the next one; after three frames everything is shown.
     for (int frame = 0; frame < 3; ++frame) {
         bool painted = false;
         const gulong handler = g_signal_connect_swapped(

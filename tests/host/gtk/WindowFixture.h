@@ -19,10 +19,10 @@
 
 namespace testing_support {
 
-/// The libraries of the previews that are linked with the test.
+/// Answers the libraries of the previews that are linked with the test.
 std::shared_ptr<host::gtk::PreviewModule> linkedPreviews();
 
-/// A real window of 400 to 700 points. A test fails when the toolkit warned of anything.
+/// Opens a real window of 400 by 700 points. A test fails when the toolkit wrote a warning.
 class WindowFixture : public ::testing::Test {
 protected:
     WindowFixture();
@@ -31,30 +31,30 @@ protected:
 
     /// Shows a screen as the root, and waits until it has its size.
     void show(const std::shared_ptr<kit::ViewController>& root);
-    /// The stack around these screens, shown.
+    /// Shows a stack of these screens and answers it.
     std::shared_ptr<kit::NavigationController> showStack(
         std::vector<std::shared_ptr<kit::ViewController>> screens);
-    /// Runs the main loop until a condition holds; a test fails after five seconds.
+    /// Runs the main loop until a condition holds. The test fails after five seconds.
     void waitFor(const std::function<bool()>& condition, const char* what);
     /// Runs the main loop until everything that was scheduled is shown and laid out.
     void settle();
-    /// Ends the window and everything that shows it.
+    /// Destroys the window and everything that shows it.
     void closeWindow();
 
     host::gtk::WindowPeer& peer() const { return *host->windowPeer(); }
     GtkWidget* windowWidget() const { return GTK_WIDGET(peer().window()); }
     host::gtk::ViewPeer* peerOf(const kit::View& view) const;
     GtkWidget* nativeOf(const kit::View& view) const { return peerOf(view)->native(); }
-    /// Where a widget stands in the widget of another view's peer.
+    /// Answers the frame of a view's widget in the widget of another view.
     platform::Rect boundsIn(const kit::View& view, const kit::View& ancestor) const;
-    /// The first widget below the window with this type and this text on its label; null: none.
+    /// Answers the first button below the window whose label has this text, or null.
     GtkWidget* findButton(const std::string& text) const;
 
     std::shared_ptr<host::gtk::GtkWindowHost> host;
     std::shared_ptr<kit::Window> window;
 };
 
-/// A screen whose view a test fills.
+/// Makes a screen whose view a test fills.
 std::shared_ptr<kit::ViewController> makeScreen(const std::string& title);
 
 } // namespace testing_support

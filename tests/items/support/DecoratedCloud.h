@@ -60,10 +60,10 @@ private:
     std::shared_ptr<platform::FileCoordinator> _real;
 };
 
-/// The real items, but for what a test changes of their attributes before they are handed out.
+/// The real items, whose attributes a test may change before they are handed out.
 class DecoratedItems : public platform::PromisedItems {
 public:
-    std::optional<Error> unreachable; ///< what every item's reachability answers, when it is set
+    std::optional<Error> unreachable; ///< the answer to every question of reachability, when it is set
     std::function<void(const Url&, Result<AttributeMap>&)> changePromised;
     std::function<void(const Url&, Result<AttributeMap>&)> changePlain;
 
@@ -111,7 +111,7 @@ private:
     platform::PromisedItems& _real;
 };
 
-/// Counts the accesses that were begun and ended; every location needs one while `isNeeded`.
+/// Counts the accesses that were begun and ended. Every location needs one while `isNeeded`.
 class CountingAccess : public platform::SecurityScopedAccess {
 public:
     bool isNeeded = true;
@@ -125,7 +125,7 @@ public:
     void stopAccessing(const Url&) override { ++stopped; }
 };
 
-/// The real identifiers, with something that happens between the steps of a look-up.
+/// The real identifiers, with a hook between the steps of a look-up.
 class DecoratedIdentifiers : public platform::DocumentIdentifiers {
 public:
     std::function<void()> beforeOpening, beforeReading;
@@ -151,7 +151,7 @@ private:
     platform::DocumentIdentifiers& _real;
 };
 
-/// The real service with these in front of its roles.
+/// The real service with the decorators above in front of its roles.
 class DecoratedCloud : public platform::CloudDocumentService {
 public:
     explicit DecoratedCloud(std::shared_ptr<platform::CloudDocumentService> real)

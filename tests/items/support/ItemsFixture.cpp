@@ -36,7 +36,7 @@ ItemsFixture::ItemsFixture()
     set.typeRegistry = types;
     set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(dispatch, types, "en_US");
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(set.typeRegistry);
-    // A list asks them for the order that it had last.
+    // A list reads its last order from these two.
     set.keyedArchiver = std::make_shared<host::system::JsonKeyedArchiver>();
     set.userDefaults = std::make_shared<host::system::JsonUserDefaults>(layout().defaults(), *dispatch);
     platform::installServices(std::move(set));

@@ -14,7 +14,7 @@
 
 namespace items_tests {
 
-/// English texts, written from left to right unless a test wants it otherwise.
+/// English texts, which are written from left to right unless a test changes that.
 class DirectedTexts : public platform::Localization {
 public:
     bool rightToLeft = false;
@@ -24,20 +24,19 @@ public:
     bool isRightToLeft() const override { return rightToLeft; }
 };
 
-/// A drive of its own for each test, with something in front of those of its roles that a test may want to
-/// fail or to change.
+/// Makes a drive for each test, with decorators in front of the roles that a test may want to fail or to
+/// change.
 class ItemsFixture : public testing::Test, public testing_support::DriveFixture {
 protected:
     ItemsFixture();
     ~ItemsFixture() override;
 
     Url at(std::string_view relativePath) const { return url(relativePath); }
-    /// The documents folder of the default container.
+    /// Answers the documents folder of the default container.
     Url root() const { return layout().defaultContainerURL(); }
     /// Changes the promised attributes of every item.
     void changeValues(std::function<void(const Url&, AttributeMap&)> change);
-    /// Writes what stands in a container's description, whether it makes sense or not; answers the
-    /// container's documents folder.
+    /// Writes a container's description, valid or not. Answers the container's documents folder.
     Url describeContainer(const std::string& identifier, const std::string& description) const;
 
     std::shared_ptr<DecoratedCloud> decorated;
@@ -46,7 +45,7 @@ protected:
     std::shared_ptr<DirectedTexts> texts = std::make_shared<DirectedTexts>();
 };
 
-/// Writes a file at a path, making the folders that lead to it; answers its location.
+/// Writes a file at a path, and makes the folders above it. Answers its location.
 Url writeFile(const std::string& path, std::string_view content);
 
 } // namespace items_tests

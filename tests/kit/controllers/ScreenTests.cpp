@@ -19,7 +19,7 @@ namespace {
 
 using Events = std::vector<std::string>;
 
-/// Writes down what happens to it.
+/// Records the callbacks that it gets.
 class Screen : public ViewController {
 public:
     Screen(std::string name, Events& events)
@@ -157,7 +157,7 @@ TEST_F(Screens, WaitForTheMovementOfAHost)
     EXPECT_EQ(navigation->topViewController(), b);
     EXPECT_TRUE(navigation->isTransitioning());
 
-    // The next change ends the first one before anything else.
+    // The next change first ends the movement of the change before.
     navigation->setViewControllers({c}, true);
     EXPECT_EQ(take(),
         (Events{"a did go", "b did appear", "did show b", "a left", "b will go", "c load", "c will appear",
@@ -165,7 +165,7 @@ TEST_F(Screens, WaitForTheMovementOfAHost)
     host->tokens.front().finish();
     EXPECT_TRUE(take().empty());
 
-    // A host that goes away loses nothing.
+    // When a host goes away, no callback is lost.
     host->tokens.clear();
     navigation->setNavigationObserver({});
     navigation->pushViewController(a, true);
@@ -177,7 +177,7 @@ TEST_F(Screens, WaitForTheMovementOfAHost)
 
 namespace {
 
-/// Sets up its stack while its view loads.
+/// Sets up its stack while its view is being loaded.
 class SelfMade : public NavigationController {
 public:
     explicit SelfMade(std::shared_ptr<ViewController> first)
@@ -310,7 +310,7 @@ TEST_F(Screens, AnAlertStaysUntilItMayClose)
     EXPECT_FALSE(question->alert->press(1));
     question->accept->setEnabled(true);
     EXPECT_FALSE(question->alert->press(1));
-    // Neither a cancel style nor an escape action: Escape does nothing.
+    // The alert has neither an action in the cancel style nor an escape action, so Escape does nothing.
     EXPECT_TRUE(window->backRequested());
     EXPECT_EQ(navigation->presentedViewController(), question->alert);
     mayClose = true;
@@ -334,7 +334,7 @@ TEST_F(Screens, AnAlertAnswersOnceAfterItHasGone)
     EXPECT_FALSE(question->alert->press(1));
     EXPECT_TRUE(question->answers.empty());
 
-    // The next alert waits for no one: what the first one left comes before it.
+    // Presenting the next alert first delivers what the first one left pending.
     const auto next = ask(AlertActionStyle::Cancel);
     navigation->presentViewController(next->alert, true);
     EXPECT_EQ(question->answers, Events{"Cancel"});

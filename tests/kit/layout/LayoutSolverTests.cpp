@@ -43,7 +43,7 @@ double miss(const LayoutSolver& solver, const Rule& rule)
     return std::abs(sum);
 }
 
-/// The sum of the misses at each priority, the highest first.
+/// Answers the sum of the misses at each priority, the highest first.
 std::map<LayoutPriority, double, std::greater<>> misses(
     const LayoutSolver& solver, const std::vector<Rule>& rules)
 {
@@ -121,7 +121,7 @@ TEST(LayoutSolver, ConstantsThatContradictOnlyOnTheWayAreNoConflict)
     EXPECT_DOUBLE_EQ(solver.value(b), 300);
 }
 
-/// Whatever was added, removed and changed before: the outcome is as good as that of a fresh solver.
+/// After any additions, removals and changes the outcome is as good as that of a fresh solver.
 TEST(LayoutSolver, IncrementalWorkEndsWhereAFreshStartEnds)
 {
     std::mt19937 random(20240917);

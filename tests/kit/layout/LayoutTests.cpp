@@ -265,7 +265,7 @@ TEST_F(Layout, FittingSizeIsTheSmallestThatHolds)
 
 namespace {
 
-/// Answers another size at every layout.
+/// Asks for another size at every layout.
 class Restless : public View {
 public:
     void layoutSubviews() override
@@ -305,7 +305,7 @@ void PrintTo(const StackCase& row, std::ostream* out)
 
 class Stack : public Layout, public testing::WithParamInterface<StackCase> { };
 
-/// A stack of 200 by 100 with spacing 10 holds views that want 40 by 12 and 20 by 12.
+/// A stack of 200 by 100 with a spacing of 10 holds views that want 40 by 12 and 20 by 12.
 TEST_P(Stack, ArrangesAndLeavesHiddenViewsOut)
 {
     const auto& given = GetParam();

@@ -29,7 +29,7 @@ Ids applied(Ids rows, const ListChanges& changes, const Ids& after)
     return rows;
 }
 
-/// Rows numbered by their identifiers; every seventh identifier is a header.
+/// Rows that are numbered by their identifiers. Every seventh identifier is a header.
 class Source : public ListViewDataSource {
 public:
     explicit Source(std::size_t count)
@@ -183,7 +183,7 @@ TEST_F(List, ManyChangesAreFewAwayFromWhatIsSeen)
         const auto few = changes.splicesExactWithin(seen);
         EXPECT_EQ(applied(before, {few, {}}, after), after);
         EXPECT_LE(few.size(), seen.count + 3);
-        // What is seen and stays is in no splice.
+        // No splice contains a visible row that stays.
         std::size_t grown = 0, shrunk = 0;
         for (const auto& splice : few) {
             const auto first = splice.position + shrunk - grown;

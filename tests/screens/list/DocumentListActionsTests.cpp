@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// What a person does in a folder's list: tap, choose, select, type, search.
+// These tests are about the user's actions in a folder's list: tap, choose, select, type, search.
 
 #include "tests/screens/support/DocumentListFixture.h"
 

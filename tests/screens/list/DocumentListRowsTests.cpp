@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// What the rows of a folder's list show.
+// These tests are about the content of the rows in a folder's list.
 
 #include "tests/screens/support/DocumentListFixture.h"
 
@@ -130,7 +130,7 @@ TEST_F(DocumentList, ShowsThumbnailsOfPicturesAndMakesThemAnewWhenTheyChange)
         const auto url = drive.writeDocument("Stuff/photo.pgm", picture);
         std::filesystem::last_write_time(
             url.path(), std::filesystem::file_time_type{std::chrono::hours(shade)});
-        // Asked on the main thread, as here, the store makes a thumbnail later and has it from then on.
+        // On the main thread, as here, the first request only schedules the making of a thumbnail.
         readRowThumbnail(url);
         drive.dispatch->runUntilIdle();
     };
@@ -167,7 +167,7 @@ TEST_F(DocumentList, ReadsDetailsOfVisibleRowsOnly)
     EXPECT_EQ(list->containedItemCount(), 10'000U);
     const auto visible = list->listView()->visibleRows();
     EXPECT_LT(visible.count, 20U);
-    // The first rows were wanted twice: when they came, and when the list was complete.
+    // The details of the first rows were wanted twice: when the rows came, and when the list was complete.
     EXPECT_LE(coordinator->takeReads().size(), 2 * visible.count);
 
     list->listView()->userScrolled({0, 5000 * list->listView()->rowHeight()});

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// What a folder's list makes of its folder: its states, its order, and where it belongs.
+// These tests are about the list of a folder as a whole: its states, its order, and its place in the drive.
 
 #include "tests/screens/support/DocumentListFixture.h"
 
@@ -27,7 +27,8 @@ using Kind = FolderEntryKind;
 TEST_F(DocumentList, TakesTheNewestOfManyStates)
 {
     const auto list = shownList(drive.makeFolder("Stuff"));
-    // Each is large enough to be compared in the background, and comes before the one before is done.
+    // Each snapshot is large enough to be compared in the background, and comes before the comparison of the
+    // one before has ended.
     for (const auto count : {3000U, 5000U, 4000U})
         lister->deliver(*list->presentedURL(), documents(count));
     EXPECT_EQ(list->containedItemCount(), 0U);

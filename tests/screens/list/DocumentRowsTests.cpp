@@ -39,7 +39,7 @@ TEST(DocumentRows, TellsWhatChangedBetweenTwoStates)
         replayed.insert(at, inserted, inserted + static_cast<std::ptrdiff_t>(splice.inserted));
     }
     EXPECT_TRUE(std::ranges::equal(replayed, after->ids()));
-    // "b" is here now; "e" came, which is no change of a row.
+    // "b" is downloaded now, which changes its row. "e" is new, which changes no row.
     EXPECT_EQ(changes.changed, (std::vector<kit::RowRange>{{1, 1}}));
 }
 

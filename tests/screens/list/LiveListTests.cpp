@@ -1,7 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// A list that follows its folder by what the kernel tells must always come to say what a fresh reading says.
+// A list that follows its folder by the kernel's notices must always end in the state that a fresh reading
+// gives.
 
 #include "screens/list/FolderContents.h"
 #include "tests/screens/support/ComponentsFixture.h"
@@ -45,7 +46,7 @@ class LiveList : public testing_support::ComponentsFixture, public testing::With
 protected:
     LiveList() { useRealLister(); }
 
-    /// A list, and what its changes made of the rows that a view would have.
+    /// A list, and the rows that a view would have after its changes.
     struct Followed {
         std::shared_ptr<FolderContents> contents;
         std::vector<kit::RowId> ids;
@@ -86,7 +87,7 @@ protected:
     }
 
     std::string path(const std::string& name) const { return drive.url("Stuff/" + name).path(); }
-    /// One change of any kind to one of a few names, so that they meet.
+    /// Makes one change of any kind to one of a few names, so that changes affect the same names.
     void changeAnything()
     {
         static const std::vector<std::string> names{"a", "B 2.txt", "b 10.txt", "b 9.pdf", "Über.txt",

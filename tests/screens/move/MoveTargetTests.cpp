@@ -49,7 +49,7 @@ protected:
         load(*picker);
         return picker;
     }
-    /// Shows the top screen, and lets its looks at the disk end.
+    /// Shows the top screen, and waits until it has read the disk.
     std::shared_ptr<MoveTargetScreen> load(const MoveTargetPicker& picker)
     {
         auto screen = std::static_pointer_cast<MoveTargetScreen>(picker.topViewController());

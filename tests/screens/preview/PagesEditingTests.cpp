@@ -19,7 +19,7 @@ namespace {
 
 using Kind = PageMark::Kind;
 
-/// The fields of the form by their places in it.
+/// The fields of the form by their indexes.
 enum Place : std::size_t { Name, Agree, Town, First, Second };
 
 class PagesEditing : public ComponentsFixture {
@@ -113,7 +113,7 @@ TEST_F(PagesEditing, MarksTextsAndKeepsWhatOthersWrote)
     EXPECT_FALSE(editing->apply(NewMarkEdit{0, Kind::Highlight, {line}, {}}));
     EXPECT_FALSE(editing->apply(NewMarkEdit{0, Kind::Underline, {line, {30, 270, 50, 20}}, {}}));
     EXPECT_TRUE(isRefused(editing->apply(NewMarkEdit{0, Kind::Highlight, {}, {}})));
-    // The mark lies where the text was selected.
+    // The mark lies on the selected text.
     const auto drawn = editing->pages()->renderPage(0, 1, {0, 0, 200, 300});
     const auto pixel = [&](int x, int y) {
         return drawn->pixels()[static_cast<std::size_t>(y * 200 + x)] & 0xFFFFFFU;

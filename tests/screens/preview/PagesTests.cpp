@@ -53,7 +53,7 @@ TEST(PageDeckTest, PlacesPagesBelowEachOtherAndGrowsWithTheZoom)
     EXPECT_EQ(deck.toPage(1, {124, 748}), (Point{50, 50}));
     EXPECT_EQ(deck.toContent(1, {50, 50, 10, 20}), (Rect{124, 748, 20, 40}));
 
-    // A narrow page stands in the middle, and a wide window does not blow pages up.
+    // A narrow page is centred, and a wide window does not enlarge pages beyond a limit.
     deck.setZoom(1);
     deck.setPages({sheet, {100, 300}});
     EXPECT_EQ(deck.pageFrame(1).x, 62);
@@ -74,7 +74,7 @@ TEST(PageDeckTest, DrawsWhatIsSeenFirstAndThenItsNeighbours)
     std::vector<std::size_t> order;
     while (const auto task = deck.nextTask(seen)) {
         order.push_back(task->page);
-        // The sixth page is damaged: it is not tried for ever.
+        // The sixth page is damaged and must not be tried for ever.
         deck.finish(*task, task->page == 5 ? std::nullopt : std::optional(drawn(*task)), seen);
     }
     EXPECT_THAT(order, ElementsAre(4, 5, 6, 3));
@@ -82,11 +82,11 @@ TEST(PageDeckTest, DrawsWhatIsSeenFirstAndThenItsNeighbours)
     EXPECT_FALSE(deck.picture(5));
     EXPECT_TRUE(deck.picture(4));
 
-    // Another size needs other pictures; until then the old ones are shown.
+    // Another size needs other pictures. Until they are drawn, the old ones are shown.
     deck.setZoom(2);
     EXPECT_EQ(deck.nextTask({0, deck.pageFrame(4).y, 224, 400})->pixelsPerPoint, 2);
     EXPECT_TRUE(deck.picture(4));
-    // A document that has changed has its pages drawn again, also the broken one.
+    // All pages of a changed document are drawn again, also the broken one.
     deck.setZoom(1);
     deck.forgetPictures();
     deck.setPages(std::vector<Size>(6, sheet));
@@ -113,7 +113,7 @@ TEST(PageDeckTest, KeepsPicturesWithinItsLimits)
             bytes += deck.picture(kept) ? deck.picture(kept)->pixels().size() * 4 : 0;
         most = std::max(most, bytes);
     }
-    // What is seen at once may go beyond it.
+    // The visible pages may together exceed the limit.
     EXPECT_LE(most, PageDeck::maxPictureBytes + 2 * 24'000'000);
 
     deck.setZoom(8);
@@ -130,7 +130,7 @@ TEST(PageDeckTest, KeepsPicturesWithinItsLimits)
     EXPECT_NEAR(part.width, closeUp.width, 1);
 }
 
-/// Remembers where it was asked to scroll to.
+/// Records the places to which it was asked to scroll.
 struct Native : PreviewViewObserver {
     void previewShouldScrollTo(const Rect& content) override { places.push_back(content); }
     std::vector<Rect> places;
@@ -195,7 +195,7 @@ TEST_F(Pages, FindsTextsFromThePageThatIsReadAndGoesAround)
     ASSERT_EQ(native->places.size(), 1U);
     const auto match = *view->currentMatch();
     EXPECT_EQ(view->deck().pageAt(match.midY()), 2U);
-    // The line stands 50 points from the left, 200 from the bottom.
+    // The line is 50 points from the left and 200 from the bottom of the page.
     EXPECT_NEAR(match.x - view->deck().pageFrame(2).x, 50, 2);
     EXPECT_NEAR(match.maxY() - view->deck().pageFrame(2).y, 100, 8);
 
@@ -231,7 +231,7 @@ TEST_F(Pages, KeepsPlaceZoomAndSearchWhenTheDocumentChanges)
     EXPECT_TRUE(native->places.empty());
     EXPECT_TRUE(hasInk(2));
 
-    // Cut off while it is shown: what can still be read of it is shown.
+    // The document is truncated while it is shown. The part that can still be read is shown.
     show({"one"});
     EXPECT_EQ(view->pageCount(), 1U);
     see(0);

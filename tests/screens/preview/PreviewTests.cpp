@@ -76,7 +76,7 @@ struct Row {
     const char* name;
     std::string_view content;
     Kind kind;
-    const char* note; ///< a part of it
+    const char* note; ///< a part of the note
 };
 
 TEST_F(Preview, ChoosesWhatToShowByTheDocument)
@@ -119,7 +119,7 @@ TEST_F(Preview, SaysWhyADocumentCannotBeShown)
     EXPECT_THAT(summary().message, HasSubstr("in the cloud"));
     EXPECT_FALSE(std::filesystem::exists(drive.url("Far.txt").path()));
 
-    // A pipe would keep a reader waiting for ever.
+    // Opening a pipe would block a reader for ever.
     ASSERT_EQ(::mkfifo(drive.url("Pipe.txt").path().c_str(), 0600), 0);
     show({drive.url("Pipe.txt")});
     drive.dispatch->runUntilIdle();
@@ -170,7 +170,7 @@ TEST_F(Preview, ReadsNoMorePixelsThanAreSeen)
     const auto view = std::dynamic_pointer_cast<PreviewPictureView>(screen->previewView());
     ASSERT_TRUE(view);
     EXPECT_EQ(view->picture().frames.front().image.pixelHeight(), 10);
-    // Seen closer, it is read once more.
+    // When the picture is enlarged, its file is read once more.
     view->userSeesPixels(11);
     view->userSeesPixels(50);
     drive.dispatch->runUntilIdle();
@@ -211,7 +211,7 @@ TEST_F(Preview, ShowsThatItIsLoadingOnlyAfterAWhile)
     EXPECT_EQ(late->screenView()->content(), text);
 }
 
-/// The buttons that are offered below what the screen says.
+/// Answers the titles of the buttons below the text.
 std::vector<std::string> offers(const PreviewController& screen)
 {
     std::vector<std::string> titles;
@@ -274,7 +274,7 @@ TEST_F(Download, CanBeStoppedAndBegunAgain)
     drive.dispatch->runUntilIdle();
     EXPECT_FALSE(std::filesystem::exists(far->path()));
     EXPECT_THAT(summary().message, HasSubstr("in the cloud"));
-    // A change that is heard of does not begin what was stopped.
+    // A notice of a change does not start the download that the user stopped.
     screen->refreshCurrentPreviewItem();
     drive.dispatch->runUntilIdle();
     EXPECT_FALSE(screen->isDownloading());
@@ -308,7 +308,7 @@ TEST_F(Download, EndsWhenTheScreenIsLeft)
     drive.dispatch->runUntilIdle();
     EXPECT_FALSE(std::filesystem::exists(far->path()));
     EXPECT_FALSE(screen->content());
-    // Whoever comes back sees it again.
+    // The content is read again when the user returns to the screen.
     appear();
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(screen->content()->text, "Hello");
@@ -325,7 +325,7 @@ TEST_F(Download, EndsWhenThePersonGoesBack)
     stack->beginAppearance(true, false);
     stack->endAppearance();
     EXPECT_TRUE(screen->isDownloading());
-    // Under another screen it goes on.
+    // The download goes on while another screen lies above.
     stack->pushViewController(std::make_shared<kit::ViewController>(), false);
     EXPECT_TRUE(screen->isDownloading());
     stack->setViewControllers({list}, false);
@@ -383,7 +383,7 @@ TEST_F(Preview, SearchesFromItsBar)
     drive.dispatch->advance(1);
     EXPECT_EQ(bars.searchBar()->countLabel()->text(), "1 of 1");
     EXPECT_TRUE(bars.searchBar()->nextButton()->press());
-    // The back key leaves the search first, then the screen.
+    // The back key first ends the search and then leaves the screen.
     EXPECT_TRUE(screen->backRequested());
     EXPECT_FALSE(bars.isSearching());
     EXPECT_EQ(screen->previewView()->query(), "");

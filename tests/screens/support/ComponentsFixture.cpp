@@ -17,7 +17,7 @@ using screens::DocumentListController;
 
 namespace {
 
-/// A service of a set that somebody else keeps.
+/// Answers a service of a set without owning it.
 template <typename T>
 std::shared_ptr<T> borrowed(T& service)
 {

@@ -22,7 +22,7 @@
 
 namespace testing_support {
 
-/// Counts the reads of the coordinator that it stands before.
+/// Counts the reads that go through it to the real coordinator.
 class CountingCoordinator : public platform::FileCoordinator {
 public:
     explicit CountingCoordinator(platform::FileCoordinator& real)
@@ -76,7 +76,7 @@ public:
     std::optional<platform::Error> answer;
 };
 
-/// Writes down what a folder list reports, one line each.
+/// Records what a folder list reports, one line for each call.
 class RecordingListDelegate : public screens::DocumentListControllerDelegate {
 public:
     void documentListControllerDidSelectContainerWithViewController(
@@ -97,30 +97,30 @@ public:
 
     std::vector<std::string> take();
 
-    std::shared_ptr<kit::ViewController> preview; ///< what a peek shows
+    std::shared_ptr<kit::ViewController> preview; ///< the screen for a peek
     bool allowsEditing = false;
 
 private:
     std::vector<std::string> _lines;
 };
 
-/// The platform's screens on a real drive in a temporary folder; the listings alone come
-/// from the test, unless it asks for the real ones.
+/// The screens on a real drive in a temporary folder. Only the listings come from the test, unless it asks
+/// for the real ones.
 class ComponentsFixture : public testing::Test {
 protected:
     using List = std::shared_ptr<screens::DocumentListController>;
 
     ComponentsFixture();
 
-    /// A list of a folder with a size for about ten rows, loaded, shown and watched by `delegate`.
+    /// Answers a list of a folder with room for about ten rows, loaded, shown and watched by `delegate`.
     List shownList(const platform::Url& folder);
     void deliver(const List& list, const HandLister::Entries& entries,
         platform::ListingStage stage = platform::ListingStage::Complete);
     std::vector<std::string> titles(const List& list) const;
 
-    /// Lists from now on come from the disk, and follow it.
+    /// From now on lists read the disk and follow it.
     void useRealLister();
-    /// Lets the kernel's notices and the virtual clock run until the condition holds; false when it never
+    /// Runs the kernel's notices and the virtual clock until the condition holds. Answers false when it never
     /// does.
     bool waitUntil(const std::function<bool()>& condition);
 

@@ -36,7 +36,7 @@ protected:
     }
 };
 
-/// Writes down the exact changes that a list's peer is told.
+/// Records the exact changes that a list's peer is told.
 struct RecordingListObserver : kit::ListViewObserver {
     using ListView = kit::ListView;
 

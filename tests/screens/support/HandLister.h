@@ -26,12 +26,13 @@ public:
         std::vector<platform::FolderSnapshot::ExtraItem> extraItems, platform::FolderGrouping grouping,
         Update update) override;
 
-    /// To the latest listing of a folder, with its extra items first; nothing happens when that has ended.
+    /// Delivers entries to the latest listing of a folder, with its extra items first. Nothing happens when
+    /// that listing has ended.
     void deliver(const platform::Url& folder, const Entries& entries,
         platform::ListingStage stage = platform::ListingStage::Complete) const;
     void fail(const platform::Url& folder, const platform::Error& error) const;
 
-    /// Of the listing that was started last.
+    /// Answers the grouping of the listing that was started last.
     platform::FolderGrouping grouping() const { return _grouping; }
     std::size_t listingsStarted() const { return _listings.size(); }
 
