@@ -1,7 +1,7 @@
 # SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 # SPDX-License-Identifier: GPL-3.0-or-later
 
-# One target per folder, and headers that only the folders allowed to can see.
+# Every folder is one target, whose headers only the folders that may include them can see.
 #
 # trw_folder(<target> <folder> [LINKS <public targets>...] [PRIVATE_LINKS <targets>...] [ONLY <regex>] [EXCEPT <regex>])
 #   makes a static library of the folder's sources. Its headers become visible as "<folder>/<Name>.h" through
