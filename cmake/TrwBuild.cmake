@@ -6,12 +6,15 @@
 # trw_folder(<target> <folder> [LINKS <public targets>...] [PRIVATE_LINKS <targets>...] [ONLY <regex>] [EXCEPT <regex>])
 #   makes a static library of the folder's sources. Its headers become visible as "<folder>/<Name>.h" through
 #   a link tree of the target's own, so a source sees exactly the folders that its target links and an include
-#   that breaks the direction of the layers does not compile. With TRW_CHECK_HEADERS every header is also
-#   compiled alone. ONLY and EXCEPT choose files of the folder by their names.
+#   that breaks the direction of the layers does not compile. ONLY and EXCEPT choose files of the folder by
+#   their names.
+#
+# With TRW_CHECK_HEADERS the target trw_headers compiles each header alone that no source of its own name
+# includes first, because compiling such a source has compiled its header alone already.
 
 option(TRW_BUILD_TESTS "Build the tests" ON)
 option(TRW_BUILD_BENCH "Build the benchmarks" OFF)
-option(TRW_CHECK_HEADERS "Compile every header alone" OFF)
+option(TRW_CHECK_HEADERS "Make the target trw_headers, which compiles headers alone" OFF)
 option(TRW_PRIVATE_LOG "Show private log arguments without being asked (development builds)" OFF)
 set(TRW_SANITIZE "" CACHE STRING "Sanitizers to build with, for -fsanitize=")
 
@@ -67,16 +70,29 @@ function(trw_folder target folder)
     endif()
 endfunction()
 
+if(TRW_CHECK_HEADERS)
+    add_custom_target(trw_headers)
+endif()
+
 function(trw_check_headers target folder headers private_links)
     set(checks "")
     foreach(header IN LISTS headers)
         cmake_path(GET header FILENAME name)
-        set(check ${CMAKE_BINARY_DIR}/header-checks/${target}/${name}.cpp)
-        file(CONFIGURE OUTPUT ${check} CONTENT "#include \"${folder}/${name}\"\n")
-        list(APPEND checks ${check})
+        cmake_path(REPLACE_EXTENSION header LAST_ONLY .cpp OUTPUT_VARIABLE source)
+        set(first "")
+        if(EXISTS ${source})
+            file(STRINGS ${source} first REGEX "^#include" LIMIT_COUNT 1)
+        endif()
+        if(NOT first STREQUAL "#include \"${folder}/${name}\"")
+            set(check ${CMAKE_BINARY_DIR}/header-checks/${target}/${name}.cpp)
+            file(CONFIGURE OUTPUT ${check} CONTENT "#include \"${folder}/${name}\"\n")
+            list(APPEND checks ${check})
+        endif()
     endforeach()
-    add_library(${target}_headers OBJECT ${checks})
-    target_compile_options(${target}_headers PRIVATE -O0 -g0)
-    target_compile_options(${target}_headers PRIVATE -Wno-unused)
-    target_link_libraries(${target}_headers PRIVATE ${target} ${private_links})
+    if(checks)
+        add_library(${target}_headers OBJECT EXCLUDE_FROM_ALL ${checks})
+        target_compile_options(${target}_headers PRIVATE -O0 -g0 -Wno-unused)
+        target_link_libraries(${target}_headers PRIVATE ${target} ${private_links})
+        add_dependencies(trw_headers ${target}_headers)
+    endif()
 endfunction()
