@@ -14,13 +14,13 @@
 
 namespace tarrow {
 
+using kit::BarButtonItem;
+using kit::SystemItem;
 using platform::Operation;
 using platform::Url;
 using screens::PreviewController;
 using screens::PreviewControllerDataSource;
 using screens::PreviewControllerDelegate;
-using kit::BarButtonItem;
-using kit::SystemItem;
 using Button = std::shared_ptr<BarButtonItem>;
 
 std::shared_ptr<LookwellItemController> LookwellItemController::defaultController()

@@ -18,11 +18,11 @@ namespace tarrow {
 namespace {
 
 using namespace testing_support;
+using kit::AlertActionStyle;
+using kit::AlertController;
 using platform::Error;
 using platform::FileErrorCode;
 using platform::Url;
-using kit::AlertActionStyle;
-using kit::AlertController;
 
 class RenameAndDeleteTest : public testing::Test, protected DriveFixture {
 protected:
@@ -48,8 +48,7 @@ protected:
     }
 
     std::shared_ptr<kit::ViewController> root = std::make_shared<kit::ViewController>();
-    std::shared_ptr<kit::Window> window =
-        std::make_shared<kit::Window>(platform::Rect{0, 0, 400, 800});
+    std::shared_ptr<kit::Window> window = std::make_shared<kit::Window>(platform::Rect{0, 0, 400, 800});
     std::vector<std::string> answers;
 };
 

@@ -14,11 +14,11 @@
 namespace tarrow {
 namespace {
 
+using kit::AlertController;
+using kit::ViewController;
 using platform::Error;
 using platform::FileErrorCode;
 using platform::PropertyDictionary;
-using kit::AlertController;
-using kit::ViewController;
 
 class UIUtilsTest : public testing::Test {
 protected:
@@ -42,8 +42,7 @@ protected:
     }
 
     std::shared_ptr<ViewController> root = std::make_shared<ViewController>();
-    std::shared_ptr<kit::Window> window =
-        std::make_shared<kit::Window>(platform::Rect{0, 0, 400, 800});
+    std::shared_ptr<kit::Window> window = std::make_shared<kit::Window>(platform::Rect{0, 0, 400, 800});
 };
 
 TEST_F(UIUtilsTest, WhatIsSaidAboutAnError)
