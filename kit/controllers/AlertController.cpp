@@ -5,6 +5,7 @@
 
 #include "kit/controllers/ViewControllerVisitor.h"
 #include "kit/views/TextField.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 
@@ -38,10 +39,7 @@ void AlertController::setMessage(std::string message)
 void AlertController::addAction(const std::shared_ptr<AlertAction>& action)
 {
     _actions.push_back(action);
-    action->setOnChange([weak = weak_from_this()] {
-        if (const auto self = weak.lock())
-            std::static_pointer_cast<AlertController>(self)->alertChanged();
-    });
+    action->setOnChange(weakly(this, &AlertController::alertChanged));
     alertChanged();
 }
 

@@ -6,6 +6,7 @@
 #include "kit/controllers/NavigationItem.h"
 #include "kit/controllers/ViewControllerVisitor.h"
 #include "kit/views/View.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 #include <utility>
@@ -132,10 +133,7 @@ void NavigationController::startTransition(const NavigationTransition& transitio
         to->beginAppearance(true, animated);
     if (const auto delegate = _delegate.lock(); delegate && to)
         delegate->navigationControllerWillShowViewControllerAnimated(*this, to, animated);
-    const auto token = TransitionToken([weak = weak_from_this(), transition] {
-        if (const auto self = weak.lock())
-            self->asNavigationController()->endTransition(transition);
-    });
+    const auto token = TransitionToken(weakly(this, &NavigationController::endTransition, transition));
     _transition = token;
     if (const auto observer = _navigationObserver.lock())
         observer->navigationWillTransition(*this, transition, token);
