@@ -7,6 +7,7 @@
 #include "platform/LinkOpener.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "screens/ErrorWords.h"
 
 #include <utility>
@@ -23,11 +24,11 @@ std::shared_ptr<kit::AlertController> makeAlert(const std::string& title, const 
     return std::make_shared<kit::AlertController>(title, message, kit::AlertStyle::Alert);
 }
 
-void showFailure(const std::shared_ptr<kit::ViewController>& presenter, const Error& error)
+void showFailure(kit::ViewController& presenter, const Error& error)
 {
     const auto alert = makeAlert(localized("The page cannot be opened"), errorWords(error));
     alert->addAction(std::make_shared<AlertAction>(localized("OK"), AlertActionStyle::Cancel));
-    presenter->presentViewController(alert, true);
+    presenter.presentViewController(alert, true);
 }
 
 } // namespace
@@ -45,24 +46,21 @@ void UpgradeFlow::beginWithPresentingViewController(const std::shared_ptr<kit::V
         localized("The page where you can choose more storage for your drive opens in your web browser."));
     alert->addAction(std::make_shared<AlertAction>(localized("Cancel"), AlertActionStyle::Cancel));
     const auto proceed = std::make_shared<AlertAction>(localized("Open Page"), AlertActionStyle::Default,
-        [self = shared_from_this(), weak = std::weak_ptr(presenter)](const auto&) {
-            if (const auto screen = weak.lock())
-                self->openPage(screen);
-        });
+        weakly(
+            presenter, [self = shared_from_this()](kit::ViewController& screen) { self->openPage(screen); }));
     proceed->setEnabled(!_offer->link.target.empty());
     alert->addAction(proceed);
     alert->setPreferredAction(proceed);
     presenter->presentViewController(alert, true);
 }
 
-void UpgradeFlow::openPage(const std::shared_ptr<kit::ViewController>& presenter)
+void UpgradeFlow::openPage(kit::ViewController& presenter)
 {
-    services().linkOpener().openLink(
-        _offer->link.target, [weak = std::weak_ptr(presenter)](const std::optional<Error>& error) {
-            const auto screen = weak.lock();
-            if (error && screen)
+    services().linkOpener().openLink(_offer->link.target,
+        weakly(&presenter, [](kit::ViewController& screen, const std::optional<Error>& error) {
+            if (error)
                 showFailure(screen, *error);
-        });
+        }));
 }
 
 } // namespace screens

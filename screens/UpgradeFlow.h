@@ -29,7 +29,7 @@ public:
     void beginWithPresentingViewController(const std::shared_ptr<kit::ViewController>& presenter);
 
 private:
-    void openPage(const std::shared_ptr<kit::ViewController>& presenter);
+    void openPage(kit::ViewController& presenter);
 
     std::shared_ptr<const StorageOffer> _offer;
 };

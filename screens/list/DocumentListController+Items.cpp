@@ -9,6 +9,7 @@
 #include "platform/CloudDocumentService.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "screens/ErrorWords.h"
 #include "screens/list/DocumentPeek.h"
 #include "screens/list/DocumentRowSource.h"
@@ -153,10 +154,7 @@ kit::Menu DocumentListController::menuForRow(kit::ListView&, std::size_t index)
     for (const auto& entry : menuEntries) {
         if (!offers(entry.action, kind))
             continue;
-        auto chosen = [weak = std::weak_ptr(self()), action = entry.action, url = rows->url(index)] {
-            if (const auto list = weak.lock())
-                list->perform(action, url);
-        };
+        auto chosen = weakly(this, &DocumentListController::perform, entry.action, rows->url(index));
         menu.push_back({.title = localized(entry.title),
             .handler = std::move(chosen),
             .style = entry.style,
@@ -168,14 +166,12 @@ kit::Menu DocumentListController::menuForRow(kit::ListView&, std::size_t index)
 kit::MenuAction DocumentListController::downloadEntry(const Url& url)
 {
     const bool isRunning = services().cloudDocumentService().items().downloadProgress(url).has_value();
-    auto chosen = [weak = std::weak_ptr(self()), url, isRunning] {
-        if (isRunning)
-            services().cloudDocumentService().items().cancelDownload(url);
-        else if (const auto list = weak.lock())
-            list->download(url);
-    };
-    return {.title = isRunning ? localized("Cancel Download") : localized("Download"),
-        .handler = std::move(chosen),
+    if (isRunning)
+        return {.title = localized("Cancel Download"),
+            .handler = [url] { services().cloudDocumentService().items().cancelDownload(url); },
+            .image = {}};
+    return {.title = localized("Download"),
+        .handler = weakly(this, &DocumentListController::download, url),
         .image = {}};
 }
 
@@ -183,16 +179,15 @@ kit::MenuAction DocumentListController::downloadEntry(const Url& url)
 void DocumentListController::download(const Url& url)
 {
     services().cloudDocumentService().items().download(
-        url, [weak = std::weak_ptr(self())](const std::optional<Error>& error) {
-            const auto list = weak.lock();
-            if (!list || !error || error->is(FileErrorCode::Cancelled))
+        url, weakly(this, [](DocumentListController& self, const std::optional<Error>& error) {
+            if (!error || error->is(FileErrorCode::Cancelled))
                 return;
             const auto alert = std::make_shared<kit::AlertController>(
                 localized("It could not be downloaded."), errorWords(*error), kit::AlertStyle::Alert);
             alert->addAction(
                 std::make_shared<kit::AlertAction>(localized("OK"), kit::AlertActionStyle::Default));
-            list->presentViewController(alert, true);
-        });
+            self.presentViewController(alert, true);
+        }));
 }
 
 void DocumentListController::perform(DocumentListAction action, const Url& url)
@@ -254,10 +249,7 @@ bool DocumentListController::rowHeld(kit::ListView& list, std::size_t index)
     const auto screen = told->documentListControllerViewControllerForPreviewingItemAtURL(self(), url);
     if (!screen)
         return false;
-    const auto open = [weak = std::weak_ptr(self()), url, kind = rows->entry(index).kind] {
-        if (const auto peeked = weak.lock())
-            peeked->openFromPeek(url, kind);
-    };
+    const auto open = weakly(this, &DocumentListController::openFromPeek, url, rows->entry(index).kind);
     const auto title = _listView->row(index).title;
     const auto peek = DocumentPeek::make(title, screen, menuForRow(list, index), open);
     _peek = peek;

@@ -4,6 +4,7 @@
 // This file holds the order of a list and the menu in which the user chooses it.
 
 #include "platform/Localization.h"
+#include "platform/Weakly.h"
 #include "screens/PlatformNames.h"
 #include "screens/list/DocumentListController.h"
 
@@ -45,24 +46,18 @@ void DocumentListController::setOrder(const ListOrder& order)
 kit::Menu DocumentListController::optionsMenu()
 {
     kit::Menu menu;
-    const auto calling = [this](auto operation) {
-        return [weak = std::weak_ptr(self()), operation] {
-            if (const auto list = weak.lock())
-                operation(*list);
-        };
-    };
     const auto choice = [&](const char* title, const ListOrder& order, bool isPresent) {
         kit::MenuAction action;
         action.title = localized(title);
-        action.handler = calling([order](DocumentListController& list) { list.setOrder(order); });
+        action.handler = weakly(this, &DocumentListController::setOrder, order);
         action.mark = markIf(isPresent);
         menu.push_back(std::move(action));
     };
     if (_editing) {
         menu.push_back({.title = localized("Select All"),
-            .handler = calling([](DocumentListController& list) { list.selectAllItems(); })});
+            .handler = weakly(this, &DocumentListController::selectAllItems)});
         menu.push_back({.title = localized("Select None"),
-            .handler = calling([](DocumentListController& list) { list.deselectAllItems(); })});
+            .handler = weakly(this, &DocumentListController::deselectAllItems)});
     }
     const auto firstChoice = menu.size();
     for (const auto& entry : keyEntries)

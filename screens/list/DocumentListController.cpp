@@ -10,6 +10,7 @@
 #include "platform/FolderLister.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "screens/ErrorWords.h"
 #include "screens/FolderPlaces.h"
 #include "screens/PlaceholderView.h"
@@ -75,11 +76,13 @@ void DocumentListController::setDelegate(std::weak_ptr<DocumentListControllerDel
     _delegate = std::move(delegate);
     if (!_rows)
         return;
-    _rows->setTagColors([weak = std::weak_ptr(self())](const std::vector<std::string>& names) {
-        const auto list = weak.lock();
-        const auto colors = list ? list->delegate() : nullptr;
-        return colors ? colors->documentListControllerColorsForTagNames(list, names) : std::vector<Color>();
-    });
+    _rows->setTagColors(weaklyOr(std::vector<Color>(), this, &DocumentListController::colorsForTags));
+}
+
+std::vector<Color> DocumentListController::colorsForTags(const std::vector<std::string>& names)
+{
+    const auto colors = delegate();
+    return colors ? colors->documentListControllerColorsForTagNames(self(), names) : std::vector<Color>();
 }
 
 void DocumentListController::loadView()
@@ -110,15 +113,10 @@ void DocumentListController::viewDidLoad()
     if (!_presentedURL)
         return;
     _order = savedOrder(*_presentedURL);
-    navigationItem().setMenu(localized("Order and Options"), [weak = std::weak_ptr(self())] {
-        const auto list = weak.lock();
-        return list ? list->optionsMenu() : kit::Menu();
-    });
-    _contents = FolderContents::create(
-        *_presentedURL, [weak = std::weak_ptr(self())](const FolderContentsUpdate& update) {
-            if (const auto list = weak.lock())
-                list->contentsDidChange(update);
-        });
+    navigationItem().setMenu(
+        localized("Order and Options"), weaklyOr(kit::Menu(), this, &DocumentListController::optionsMenu));
+    _contents =
+        FolderContents::create(*_presentedURL, weakly(this, &DocumentListController::contentsDidChange));
     refresh();
     followLibraries();
     showLoadingAfterDelay();
@@ -143,11 +141,11 @@ void DocumentListController::offerSearch()
     // narrow bar has no room to spare.
     if (!shouldShowSearch() || _editing)
         return navigationItem().setSearchAction({});
-    navigationItem().setSearchAction([weak = std::weak_ptr(self())] {
+    navigationItem().setSearchAction(weakly(this, [](DocumentListController& self) {
         // A shortcut triggers the button also while another screen lies over the list.
-        if (const auto list = weak.lock(); list && !list->presentedViewController())
-            list->startSearchWithQueryStringBecomeFirstResponder({}, true);
-    });
+        if (!self.presentedViewController())
+            self.startSearchWithQueryStringBecomeFirstResponder({}, true);
+    }));
 }
 
 void DocumentListController::refresh()
@@ -163,18 +161,13 @@ void DocumentListController::followLibraries()
     if (rootFolder() != _presentedURL)
         return;
     _libraries = services().folderLister().list(_presentedURL->deletingLastPathComponent(), {},
-        FolderGrouping::FoldersFirst, [weak = std::weak_ptr(self())](const auto&) {
-            const auto list = weak.lock();
-            if (!list)
-                return;
-            list->librariesMayHaveChanged();
+        FolderGrouping::FoldersFirst, weakly(this, [](DocumentListController& self) {
+            self.librariesMayHaveChanged();
             // A library's name may be written to the disk after its folder.
             auto& dispatch = services().dispatch();
-            dispatch.after(librarySettles, dispatch.mainQueue(), [weak] {
-                if (const auto later = weak.lock())
-                    later->librariesMayHaveChanged();
-            });
-        });
+            dispatch.after(librarySettles, dispatch.mainQueue(),
+                weakly(&self, &DocumentListController::librariesMayHaveChanged));
+        }));
 }
 
 void DocumentListController::librariesMayHaveChanged()
@@ -195,10 +188,7 @@ void DocumentListController::viewDidAppear(bool animated)
     }
     // The delegate takes the list off the stack, which must not happen while the stack is still changing.
     if (_wasRemoved)
-        services().dispatch().mainQueue()->async([weak = std::weak_ptr(self())] {
-            if (const auto list = weak.lock())
-                list->reportRemovalIfShown();
-        });
+        services().dispatch().mainQueue()->async(weakly(this, &DocumentListController::reportRemovalIfShown));
 }
 
 void DocumentListController::contentsDidChange(const FolderContentsUpdate& update)
@@ -247,13 +237,12 @@ void DocumentListController::showStateOfFolder()
 void DocumentListController::showLoadingAfterDelay()
 {
     auto& dispatch = services().dispatch();
-    dispatch.after(loadingDelay, dispatch.mainQueue(), [weak = std::weak_ptr(self())] {
-        const auto list = weak.lock();
-        if (!list || list->_state)
+    dispatch.after(loadingDelay, dispatch.mainQueue(), weakly(this, [](DocumentListController& self) {
+        if (self._state)
             return;
-        list->_placeholder->setContent({.message = localized("Loading…"), .isBusy = true});
-        list->_placeholder->setHidden(false);
-    });
+        self._placeholder->setContent({.message = localized("Loading…"), .isBusy = true});
+        self._placeholder->setHidden(false);
+    }));
 }
 
 void DocumentListController::reportRemovalIfShown()
@@ -270,18 +259,12 @@ void DocumentListController::startSearchWithQueryStringBecomeFirstResponder(
     const std::string& query, bool becomeFirstResponder)
 {
     view();
-    const auto weak = std::weak_ptr(self());
     _search = DocumentSearch::create({
-        .chosen =
-            [weak](const Url& url, FolderEntryKind kind) {
-                if (const auto list = weak.lock())
-                    list->open(url, kind);
-            },
-        .showInFolder =
-            [weak](const Url& url) {
-                if (const auto list = weak.lock())
-                    list->open(url.deletingLastPathComponent(), FolderEntryKind::Folder);
-            },
+        .chosen = weakly(this, &DocumentListController::open),
+        .showInFolder = weakly(this,
+            [](DocumentListController& self, const Url& url) {
+                self.open(url.deletingLastPathComponent(), FolderEntryKind::Folder);
+            }),
     });
     const auto presentation = _search->presentation();
     presentation->setQuery(query);

@@ -7,6 +7,7 @@
 #include "kit/views/TapRecognizer.h"
 #include "kit/views/View.h"
 #include "platform/Localization.h"
+#include "platform/Weakly.h"
 #include "screens/PlatformNames.h"
 
 #include <utility>
@@ -59,11 +60,10 @@ private:
         pane->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
         pane->setFrame(place->bounds());
         pane->setAccessibility({.label = {}, .hint = {}, .isHidden = true});
-        pane->addGestureRecognizer(std::make_shared<kit::TapRecognizer>([weak = weak_from_this()](Point) {
-            const auto self = std::static_pointer_cast<Miniature>(weak.lock());
-            if (self && self->_onTap)
-                self->_onTap();
-        }));
+        pane->addGestureRecognizer(std::make_shared<kit::TapRecognizer>(weakly(this, [](Miniature& self) {
+            if (self._onTap)
+                self._onTap();
+        })));
         place->addSubview(pane);
     }
 
@@ -90,9 +90,8 @@ std::shared_ptr<kit::AlertController> DocumentPeek::make(const std::string& titl
         std::make_shared<kit::AlertController>(title, std::string(), kit::AlertStyle::ActionSheet);
     const auto miniature = std::make_shared<Miniature>(screen);
     const auto opening = std::make_shared<kit::AlertAction>(localized("Open"), kit::AlertActionStyle::Default,
-        [weak = std::weak_ptr(miniature), open = std::move(open)](const auto&) {
-            if (const auto held = weak.lock())
-                held->release();
+        [release = weakly(miniature, &Miniature::release), open = std::move(open)](const auto&) {
+            release();
             open();
         });
     peek->addAction(opening);
@@ -100,10 +99,7 @@ std::shared_ptr<kit::AlertController> DocumentPeek::make(const std::string& titl
     for (const auto& action : actions)
         peek->addAction(asAlertAction(action));
     peek->addAction(std::make_shared<kit::AlertAction>(localized("Cancel"), kit::AlertActionStyle::Cancel));
-    miniature->setOnTap([weak = std::weak_ptr(peek), opening] {
-        if (const auto shown = weak.lock())
-            shown->press(opening);
-    });
+    miniature->setOnTap(weakly(peek, [opening](kit::AlertController& shown) { shown.press(opening); }));
     peek->setContentViewController(miniature);
     return peek;
 }

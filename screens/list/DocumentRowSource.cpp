@@ -8,6 +8,7 @@
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"
+#include "platform/Weakly.h"
 #include "screens/DetailText.h"
 #include "screens/DisplayName.h"
 #include "screens/list/RowThumbnail.h"
@@ -51,21 +52,14 @@ std::string spokenDescription(
 std::shared_ptr<DocumentRowSource> DocumentRowSource::create(const std::shared_ptr<kit::ListView>& list)
 {
     const auto source = std::make_shared<DocumentRowSource>(list);
-    const std::weak_ptr weak = source;
     source->_loader = std::make_shared<Loader>(
         "row details", QualityOfService::UserInitiated,
         [](const RowRequest& request) { return readRowDetails(request.url, request.kind); },
-        [weak](kit::RowId id, RowDetails details) {
-            if (const auto self = weak.lock())
-                self->detailsArrived(id, std::move(details));
-        });
+        weakly(source, &DocumentRowSource::detailsArrived));
     source->_thumbnails = std::make_shared<ThumbnailLoader>(
         "row thumbnails", QualityOfService::Utility,
         [](const RowRequest& request) { return readRowThumbnail(request.url); },
-        [weak](kit::RowId id, std::optional<Image> thumbnail) {
-            if (const auto self = weak.lock())
-                self->thumbnailArrived(id, std::move(thumbnail));
-        });
+        weakly(source, &DocumentRowSource::thumbnailArrived));
     source->followDownloads();
     return source;
 }
@@ -128,13 +122,12 @@ void DocumentRowSource::complete(kit::ListRow& row, const RowDetails& details) c
 
 void DocumentRowSource::followDownloads()
 {
-    _onDownloads = services().notificationCenter().observe(
-        Notification::DownloadsDidChange, [weak = weak_from_this()](const PropertyDictionary& userInfo) {
-            const auto self = weak.lock();
+    _onDownloads = services().notificationCenter().observe(Notification::DownloadsDidChange,
+        weakly(this, [](DocumentRowSource& self, const PropertyDictionary& userInfo) {
             const auto url = userInfo.find("url");
-            if (self && self->_rows && url != userInfo.end())
-                self->tellIfVisible(self->_rows->idFor(*url->second.get<Url>()));
-        });
+            if (self._rows && url != userInfo.end())
+                self.tellIfVisible(self._rows->idFor(*url->second.get<Url>()));
+        }));
 }
 
 void DocumentRowSource::showDownload(kit::ListRow& row, std::size_t index) const

@@ -6,6 +6,7 @@
 #include "kit/views/ListView.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "screens/FolderPlaces.h"
 #include "screens/PlaceholderView.h"
 #include "screens/list/DocumentRowSource.h"
@@ -68,11 +69,8 @@ void DocumentSearch::build()
 
 void DocumentSearch::begin()
 {
-    _session = services().nameSearch().begin(
-        searchableFolders(), [weak = weak_from_this()](const NameSearchResults& results) {
-            if (const auto self = weak.lock())
-                self->resultsArrived(results);
-        });
+    _session =
+        services().nameSearch().begin(searchableFolders(), weakly(this, &DocumentSearch::resultsArrived));
 }
 
 void DocumentSearch::searchQueryDidChange(kit::SearchPresentation&)
@@ -159,10 +157,8 @@ kit::Menu DocumentSearch::menuForRow(kit::ListView&, std::size_t index)
     const auto& rows = _source->rows();
     if (!rows || index >= rows->count())
         return {};
-    auto show = [weak = weak_from_this(), url = rows->url(index)] {
-        if (const auto self = weak.lock())
-            self->_handlers.showInFolder(url);
-    };
+    auto show =
+        weakly(this, [url = rows->url(index)](DocumentSearch& self) { self._handlers.showInFolder(url); });
     return {{.title = localized("Show in Its Folder"), .handler = std::move(show), .image = {}}};
 }
 

@@ -4,6 +4,7 @@
 #include "screens/list/FolderContents.h"
 
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 #include <utility>
@@ -41,10 +42,7 @@ void FolderContents::start(std::vector<FolderSnapshot::ExtraItem> extraItems, co
     _order = order;
     _waiting.clear();
     _listing = services().folderLister().list(
-        _folder, std::move(extraItems), order.grouping, [weak = weak_from_this()](Snapshot snapshot) {
-            if (const auto self = weak.lock())
-                self->snapshotArrived(std::move(snapshot));
-        });
+        _folder, std::move(extraItems), order.grouping, weakly(this, &FolderContents::snapshotArrived));
 }
 
 void FolderContents::snapshotArrived(Snapshot snapshot)
@@ -83,19 +81,19 @@ void FolderContents::workOutInBackground(Snapshot snapshot)
     _queue->addOperation([weak = weak_from_this(), before = _rows, snapshot, order = _order, main] {
         const auto update =
             std::make_shared<const FolderContentsUpdate>(updateBetween(*before, snapshot, order));
-        main->async([weak, update] {
-            const auto self = weak.lock();
-            if (!self)
-                return;
-            self->_isWorking = false;
-            self->adopt(*update);
-            if (self->_waiting.empty() || self->_isWorking)
-                return;
-            const auto next = std::move(self->_waiting.front());
-            self->_waiting.pop_front();
-            self->workOut(next);
-        });
+        main->async(weakly(weak, [update](FolderContents& self) { self.workEnded(*update); }));
     });
+}
+
+void FolderContents::workEnded(const FolderContentsUpdate& update)
+{
+    _isWorking = false;
+    adopt(update);
+    if (_waiting.empty() || _isWorking)
+        return;
+    const auto next = std::move(_waiting.front());
+    _waiting.pop_front();
+    workOut(next);
 }
 
 void FolderContents::adopt(const FolderContentsUpdate& update)

@@ -48,6 +48,7 @@ private:
     void wait(Snapshot snapshot);
     void workOut(Snapshot snapshot);
     void workOutInBackground(Snapshot snapshot);
+    void workEnded(const FolderContentsUpdate& update);
     void adopt(const FolderContentsUpdate& update);
 
     Url _folder;

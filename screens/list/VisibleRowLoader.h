@@ -8,6 +8,7 @@
 #include "platform/FolderSnapshot.h"
 #include "platform/Services.h"
 #include "platform/Url.h"
+#include "platform/Weakly.h"
 #include "screens/PlatformNames.h"
 
 #include <cstdint>
@@ -128,10 +129,7 @@ private:
             if (!shared->isWanted(request.id, ticket)
                 || !shared->keep({request.id, ticket, shared->read(request)}))
                 return;
-            main->async([weak] {
-                if (const auto self = weak.lock())
-                    self->deliver();
-            });
+            main->async(weakly(weak, &VisibleRowLoader::deliver));
         });
     }
 

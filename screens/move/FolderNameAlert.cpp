@@ -6,6 +6,7 @@
 #include "kit/controllers/AlertController.h"
 #include "kit/views/TextField.h"
 #include "platform/Localization.h"
+#include "platform/Weakly.h"
 #include "screens/PlatformNames.h"
 
 #include <utility>
@@ -29,33 +30,34 @@ bool canBeName(const std::string& name)
         && name.find_first_of("/:") == std::string::npos;
 }
 
+std::string nameIn(const kit::AlertController& alert)
+{
+    return trimmed(alert.textFields().front()->text());
+}
+
 } // namespace
 
 std::shared_ptr<kit::AlertController> makeFolderNameAlert(std::function<void(const std::string&)> chosen)
 {
     const auto alert = std::make_shared<kit::AlertController>(
         localized("New Folder"), std::string(), kit::AlertStyle::Alert);
-    const std::weak_ptr<kit::AlertController> weak = alert;
     alert->addTextField([](kit::TextField& field) {
         field.setPlaceholder(localized("Name"));
         field.setInputTraits(
             {.returnKey = kit::ReturnKey::Done, .clearButton = kit::ClearButton::WhileEditing});
     });
     alert->addAction(std::make_shared<kit::AlertAction>(localized("Cancel"), kit::AlertActionStyle::Cancel));
-    const auto create = std::make_shared<kit::AlertAction>(
-        localized("Create"), kit::AlertActionStyle::Default, [weak, chosen = std::move(chosen)](const auto&) {
-            if (const auto asked = weak.lock())
-                chosen(trimmed(asked->textFields().front()->text()));
-        });
+    const auto create = std::make_shared<kit::AlertAction>(localized("Create"),
+        kit::AlertActionStyle::Default,
+        weakly(alert, [chosen = std::move(chosen)](kit::AlertController& asked) { chosen(nameIn(asked)); }));
     create->setEnabled(false);
     alert->addAction(create);
     alert->setPreferredAction(create);
-    alert->textFields().front()->setOnEditingChanged([weak, action = std::weak_ptr(create)] {
-        const auto asked = weak.lock();
-        const auto pressed = action.lock();
-        if (asked && pressed)
-            pressed->setEnabled(canBeName(trimmed(asked->textFields().front()->text())));
-    });
+    alert->textFields().front()->setOnEditingChanged(
+        weakly(alert, [action = std::weak_ptr(create)](kit::AlertController& asked) {
+            if (const auto pressed = action.lock())
+                pressed->setEnabled(canBeName(nameIn(asked)));
+        }));
     return alert;
 }
 

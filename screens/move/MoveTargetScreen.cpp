@@ -10,6 +10,7 @@
 #include "platform/FileSystem.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "screens/ErrorWords.h"
 #include "screens/FolderPlaces.h"
 #include "screens/PlaceholderView.h"
@@ -70,20 +71,13 @@ void MoveTargetScreen::viewDidLoad()
     const bool showsLibraries = picker && picker->scope() == MoveTargetScope::AllContainers;
     _rows = std::make_shared<MoveTargetRows>(
         showsLibraries ? MoveTargetRows::Libraries::Shown : MoveTargetRows::Libraries::Hidden,
-        [weak = _picker](const Url& folder) {
-            const auto picking = weak.lock();
-            return picking && picking->isToBeMoved(folder);
-        });
+        weaklyOr(false, _picker, &MoveTargetPicker::isToBeMoved));
     _listView->setDataSource(_rows);
     _listView->setListDelegate(
         std::shared_ptr<kit::ListViewDelegate>(self(), static_cast<kit::ListViewDelegate*>(this)));
     _listing = services().folderLister().list(_folder,
         showsLibraries ? extraItemsOf(_folder) : std::vector<FolderSnapshot::ExtraItem>(),
-        FolderGrouping::FoldersFirst,
-        [weak = std::weak_ptr(self())](const std::shared_ptr<const FolderSnapshot>& snapshot) {
-            if (const auto screen = weak.lock())
-                screen->snapshotArrived(snapshot);
-        });
+        FolderGrouping::FoldersFirst, weakly(this, &MoveTargetScreen::snapshotArrived));
     findRecents();
 }
 
@@ -94,21 +88,12 @@ void MoveTargetScreen::makeBars()
         return;
     const auto count = static_cast<std::int64_t>(picker->itemsToMove().size());
     navigationItem().setSubtitle(localizedPlural(".DICT.MOVE_ITEMS.%d", {count}));
-    navigationItem().setRightItem(
-        std::make_shared<kit::BarButtonItem>(kit::SystemItem::Cancel, [weak = _picker](const auto&) {
-            if (const auto picking = weak.lock())
-                picking->cancel();
-        }));
+    navigationItem().setRightItem(std::make_shared<kit::BarButtonItem>(
+        kit::SystemItem::Cancel, weakly(_picker, &MoveTargetPicker::cancel)));
     const auto newFolder = std::make_shared<kit::BarButtonItem>(
-        localized("New Folder"), [weak = std::weak_ptr(self())](const auto&) {
-            if (const auto screen = weak.lock())
-                screen->askForNewFolder();
-        });
+        localized("New Folder"), weakly(this, &MoveTargetScreen::askForNewFolder));
     _moveButton = std::make_shared<kit::BarButtonItem>(
-        localized("Move Here"), [weak = _picker, folder = _folder](const auto&) {
-            if (const auto picking = weak.lock())
-                picking->choose(folder);
-        });
+        localized("Move Here"), weakly(_picker, &MoveTargetPicker::choose, _folder));
     _moveButton->setEnabled(picker->canChoose(_folder));
     setToolbarItems(
         {newFolder, std::make_shared<kit::BarButtonItem>(kit::SystemItem::FlexibleSpace), _moveButton});
@@ -172,10 +157,8 @@ void MoveTargetScreen::findRecents()
                 && present.size() < shownRecents)
                 present.push_back(folder);
         }
-        main->async([weak, present = std::move(present)] {
-            if (const auto screen = weak.lock(); screen && !present.empty())
-                screen->showRecents(present);
-        });
+        if (!present.empty())
+            main->async(weakly(weak, &MoveTargetScreen::showRecents, std::move(present)));
     });
 }
 
@@ -200,10 +183,7 @@ void MoveTargetScreen::rowActivated(kit::ListView&, std::size_t index)
 
 void MoveTargetScreen::askForNewFolder()
 {
-    const auto alert = makeFolderNameAlert([weak = std::weak_ptr(self())](const std::string& name) {
-        if (const auto screen = weak.lock())
-            screen->makeFolder(name);
-    });
+    const auto alert = makeFolderNameAlert(weakly(this, &MoveTargetScreen::makeFolder));
     presentViewController(alert, true);
 }
 
@@ -217,10 +197,7 @@ void MoveTargetScreen::makeFolder(const std::string& name)
             made, WritingOptions::None, [&failed](const Url& location) {
                 failed = services().fileSystem().createFolder(location.path());
             });
-        main->async([weak, made, error = refused ? refused : failed] {
-            if (const auto screen = weak.lock())
-                screen->folderWasMade(made, error);
-        });
+        main->async(weakly(weak, &MoveTargetScreen::folderWasMade, made, refused ? refused : failed));
     });
 }
 

@@ -6,6 +6,7 @@
 #include "platform/Formatters.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "screens/ErrorWords.h"
 #include "screens/PlatformNames.h"
 #include "screens/preview/PreviewContent.h"
@@ -43,19 +44,10 @@ void PreviewController::startDownload()
 {
     if (_download || !_isDownloadWanted || !_content || _content->kind != PreviewContent::Kind::InCloud)
         return;
-    const std::weak_ptr<PreviewController> weak = self();
     _summary = nullptr;
     _download = services().cloudDocumentService().items().startDownload(*_item,
-        {.progress =
-                [weak](const DownloadProgress& progress) {
-                    if (const auto screen = weak.lock())
-                        screen->showDownload(progress);
-                },
-            .completion =
-                [weak](const std::optional<Error>& error) {
-                    if (const auto screen = weak.lock())
-                        screen->downloadEnded(error);
-                }});
+        {.progress = weakly(this, &PreviewController::showDownload),
+            .completion = weakly(this, &PreviewController::downloadEnded)});
     showDownload({});
 }
 
@@ -65,7 +57,7 @@ void PreviewController::showDownload(const DownloadProgress& progress)
         return;
     if (!_summary) {
         _summary = PreviewSummaryView::create();
-        _summary->setActions({{localized("Cancel"), calling(&PreviewController::cancelDownload)}});
+        _summary->setActions({{localized("Cancel"), weakly(this, &PreviewController::cancelDownload)}});
         _screen->setContent(_summary);
         connectPreview();
     }

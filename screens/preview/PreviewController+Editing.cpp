@@ -6,6 +6,7 @@
 #include "kit/controllers/NavigationController.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "screens/AlertParts.h"
 #include "screens/DisplayName.h"
 #include "screens/ErrorWords.h"
@@ -66,15 +67,11 @@ void PreviewController::beginEditing()
         return;
     _isEditingWanted = true;
     _lastNavigation = navigationController();
-    PreviewEditing::begin(
-        *_item, [weak = std::weak_ptr(self()), generation = _generation](const auto& begun) {
-            const auto screen = weak.lock();
-            if (!screen || !screen->_isEditingWanted)
-                return;
-            screen->_isEditingWanted = false;
-            if (screen->_generation == generation)
-                screen->editingBegan(begun);
-        });
+    PreviewEditing::begin(*_item,
+        weakly(this, [generation = _generation](PreviewController& self, const Result<Editing>& begun) {
+            if (std::exchange(self._isEditingWanted, false) && self._generation == generation)
+                self.editingBegan(begun);
+        }));
 }
 
 void PreviewController::editingBegan(const Result<Editing>& begun)
@@ -93,28 +90,17 @@ void PreviewController::editingBegan(const Result<Editing>& begun)
         pages->continueWith(editing->pages());
     else
         pages->setDocument(editing->pages(), editing->pages()->pageSize(0));
-    const std::weak_ptr<PreviewController> weak = self();
     _editor = PreviewEditor::create(editing, pages,
-        {.present =
-                [weak](const auto& presented) {
-                    if (const auto screen = weak.lock())
-                        screen->alert(presented);
-                },
-            .layoutDidChange =
-                [weak] {
-                    if (const auto screen = weak.lock())
-                        screen->showEditBars();
-                },
-            .done = calling(&PreviewController::endEditing)});
+        {.present = weakly(this, &PreviewController::alert),
+            .layoutDidChange = weakly(this, &PreviewController::showEditBars),
+            .done = weakly(this, &PreviewController::endEditing)});
     _edited.push_back(editing);
     auto& center = services().notificationCenter();
-    const auto observe = [&](Notification notification, void (PreviewController::*act)()) {
-        return center.observe(notification, [call = calling(act)](const auto&) { call(); });
-    };
     _observations.clear();
-    _observations.push_back(
-        observe(Notification::ApplicationWillResignActive, &PreviewController::keepEdits));
-    _observations.push_back(observe(Notification::ApplicationWillTerminate, &PreviewController::programEnds));
+    _observations.push_back(center.observe(
+        Notification::ApplicationWillResignActive, weakly(this, &PreviewController::keepEdits)));
+    _observations.push_back(center.observe(
+        Notification::ApplicationWillTerminate, weakly(this, &PreviewController::programEnds)));
     showEditBars();
     pages->takeFocus();
 }
@@ -137,19 +123,16 @@ void PreviewController::connectPages()
     const auto pages = std::dynamic_pointer_cast<PreviewPagesView>(_previewView);
     if (!pages || _editor)
         return;
-    const std::weak_ptr<PreviewController> weak = self();
-    pages->setOnTap([weak](const PreviewPagesView::PagePlace& place) {
-        const auto screen = weak.lock();
-        const auto shown =
-            screen ? std::dynamic_pointer_cast<PreviewPagesView>(screen->_previewView) : nullptr;
-        if (!shown)
-            return;
-        shown->findMark(place, [weak](const std::optional<PageMark>& mark) {
-            const auto reader = weak.lock();
-            if (reader && mark && !mark->text.empty())
-                reader->alert(makeNoteAlert(*mark));
-        });
-    });
+    pages->setOnTap(weakly(this, [](PreviewController& self, const PreviewPagesView::PagePlace& place) {
+        if (const auto shown = std::dynamic_pointer_cast<PreviewPagesView>(self._previewView))
+            shown->findMark(place, weakly(&self, &PreviewController::showNote));
+    }));
+}
+
+void PreviewController::showNote(const std::optional<PageMark>& mark)
+{
+    if (mark && !mark->text.empty())
+        alert(makeNoteAlert(*mark));
 }
 
 void PreviewController::removeEditor()
@@ -208,10 +191,7 @@ void PreviewController::keep(const Editing& editing)
     }
     if (!shouldSave(editing->item()))
         return askForUnsaved(editing);
-    editing->save([weak = std::weak_ptr(self()), editing](const EditsKept& outcome) {
-        if (const auto screen = weak.lock())
-            screen->kept(editing, outcome);
-    });
+    editing->save(weakly(this, &PreviewController::kept, editing));
 }
 
 void PreviewController::kept(const Editing& editing, const EditsKept& outcome)
@@ -246,14 +226,11 @@ void PreviewController::askAfterFailure(const Editing& editing, const EditsKept&
 {
     if (std::ranges::count(_edited, editing) == 0)
         _edited.push_back(editing);
-    const std::weak_ptr<PreviewController> weak = self();
     const auto question = std::make_shared<kit::AlertController>(
         localized("“%@” could not be saved", {nameOf(editing->item())}),
         outcome.error ? whyNotChanged(*outcome.error) : std::string(), kit::AlertStyle::Alert);
-    question->addAction(alertAction(localized("Try Again"), kit::AlertActionStyle::Default, [weak, editing] {
-        if (const auto screen = weak.lock())
-            screen->keep(editing);
-    }));
+    question->addAction(alertAction(localized("Try Again"), kit::AlertActionStyle::Default,
+        weakly(this, &PreviewController::keep, editing)));
     addCopyAndDiscard(*question, editing);
     alert(question);
 }
@@ -269,18 +246,14 @@ void PreviewController::askForUnsaved(const Editing& editing)
 
 void PreviewController::addCopyAndDiscard(kit::AlertController& question, const Editing& editing)
 {
-    const std::weak_ptr<PreviewController> weak = self();
-    question.addAction(alertAction(localized("Keep a Copy"), kit::AlertActionStyle::Default, [weak, editing] {
-        editing->saveCopy([weak, editing](const EditsKept& outcome) {
-            if (const auto screen = weak.lock())
-                screen->keptCopy(editing, outcome);
-        });
-    }));
+    const auto told = weakly(this, &PreviewController::keptCopy, editing);
+    question.addAction(alertAction(localized("Keep a Copy"), kit::AlertActionStyle::Default,
+        [editing, told] { editing->saveCopy(told); }));
+    const auto discarded = weakly(this, &PreviewController::showOnDisk, editing);
     question.addAction(
-        alertAction(localized("Discard Changes"), kit::AlertActionStyle::Destructive, [weak, editing] {
+        alertAction(localized("Discard Changes"), kit::AlertActionStyle::Destructive, [editing, discarded] {
             editing->discard();
-            if (const auto screen = weak.lock())
-                screen->showOnDisk(editing);
+            discarded();
         }));
 }
 
@@ -308,16 +281,18 @@ void PreviewController::showOnDisk(const Editing& editing)
 void PreviewController::followChange()
 {
     const auto editing = _editor->editing();
-    editing->checkItem([weak = std::weak_ptr(self()), editing](bool isChanged) {
-        const auto screen = weak.lock();
-        if (!screen || !isChanged || !screen->_editor || screen->_editor->editing() != editing)
-            return;
-        screen->_editor->finishWriting();
-        if (!editing->hasUnsavedEdits())
-            return screen->showOnDisk(editing);
-        screen->_screen->setNote(
-            localized("Another program has changed this document. Your changes will go into a copy."));
-    });
+    editing->checkItem(weakly(this, &PreviewController::itemChecked, editing));
+}
+
+void PreviewController::itemChecked(const Editing& editing, bool isChanged)
+{
+    if (!isChanged || !_editor || _editor->editing() != editing)
+        return;
+    _editor->finishWriting();
+    if (!editing->hasUnsavedEdits())
+        return showOnDisk(editing);
+    _screen->setNote(
+        localized("Another program has changed this document. Your changes will go into a copy."));
 }
 
 /// The program ends, so the edits are written at once: no alert could ask the user, and no queue would run

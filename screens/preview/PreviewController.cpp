@@ -12,6 +12,7 @@
 #include "platform/ItemDownload.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "screens/DisplayName.h"
 #include "screens/preview/PreviewEditor.h"
 #include "screens/preview/PreviewLoader.h"
@@ -80,16 +81,9 @@ void PreviewController::setOpenInHandler(OpenInHandler handler)
 void PreviewController::loadView()
 {
     _screen = PreviewScreenView::create();
-    const std::weak_ptr<PreviewController> weak = self();
-    _screen->toolbar()->setOnFind([weak] {
-        if (const auto screen = weak.lock())
-            screen->beginSearch();
-    });
-    _screen->toolbar()->setOnEdit(calling(&PreviewController::beginEditing));
-    _screen->searchBar()->setOnClose([weak] {
-        if (const auto screen = weak.lock())
-            screen->endSearch();
-    });
+    _screen->toolbar()->setOnFind(weakly(this, &PreviewController::beginSearch));
+    _screen->toolbar()->setOnEdit(weakly(this, &PreviewController::beginEditing));
+    _screen->searchBar()->setOnClose(weakly(this, &PreviewController::endSearch));
     setView(_screen);
 }
 
@@ -207,10 +201,10 @@ void PreviewController::load(const PreviewLimits& limits)
             return;
         const auto content = std::make_shared<const PreviewContent>(
             loadPreview(item, limits, [&] { return cancelled->load(); }));
-        main->async([weak, content, generation] {
-            if (const auto screen = weak.lock(); screen && screen->_generation == generation)
-                screen->show(content);
-        });
+        main->async(weakly(weak, [content, generation](PreviewController& self) {
+            if (self._generation == generation)
+                self.show(content);
+        }));
     });
 }
 
@@ -287,30 +281,20 @@ void PreviewController::connectPreview()
     _screen->setNeedsLayout();
     if (!shown)
         return;
-    const std::weak_ptr<PreviewController> weak = self();
-    shown->setOnStateChange([weak] {
-        const auto screen = weak.lock();
-        if (!screen)
-            return;
-        screen->_screen->toolbar()->update();
-        screen->_screen->searchBar()->update();
-        if (screen->_editor)
-            screen->_editor->update();
-    });
-    shown->setOnFind([weak] {
-        if (const auto screen = weak.lock())
-            screen->beginSearch();
-    });
-    shown->setOnFailure([weak](const std::string& words) {
-        if (const auto screen = weak.lock())
-            screen->previewFailed(words);
-    });
+    shown->setOnStateChange(weakly(this, &PreviewController::updateBars));
+    shown->setOnFind(weakly(this, &PreviewController::beginSearch));
+    shown->setOnFailure(weakly(this, &PreviewController::previewFailed));
     connectPages();
     if (const auto picture = std::dynamic_pointer_cast<PreviewPictureView>(shown))
-        picture->setOnNeedsPixels([weak] {
-            if (const auto screen = weak.lock())
-                screen->load(previewLimitsForCloseLook());
-        });
+        picture->setOnNeedsPixels(weakly(this, &PreviewController::load, previewLimitsForCloseLook()));
+}
+
+void PreviewController::updateBars()
+{
+    _screen->toolbar()->update();
+    _screen->searchBar()->update();
+    if (_editor)
+        _editor->update();
 }
 
 void PreviewController::previewFailed(const std::string& words)
@@ -321,25 +305,17 @@ void PreviewController::previewFailed(const std::string& words)
     show(std::make_shared<const PreviewContent>(std::move(failure)));
 }
 
-std::function<void()> PreviewController::calling(void (PreviewController::*action)())
-{
-    return [weak = std::weak_ptr(self()), action] {
-        if (const auto screen = weak.lock())
-            ((*screen).*action)();
-    };
-}
-
 void PreviewController::showSummary()
 {
     _summary =
         summaryView({.iconName = _content->iconName, .title = _content->title, .message = _content->note});
     std::vector<PreviewSummaryView::Action> actions;
     if (_content->kind == PreviewContent::Kind::InCloud)
-        actions.push_back({localized("Download"), calling(&PreviewController::startAgain), true});
+        actions.push_back({localized("Download"), weakly(this, &PreviewController::startAgain), true});
     else if (_content->canRetry)
-        actions.push_back({localized("Try Again"), calling(&PreviewController::startAgain), true});
+        actions.push_back({localized("Try Again"), weakly(this, &PreviewController::startAgain), true});
     else if (_openIn)
-        actions.push_back({localized("Open in…"), calling(&PreviewController::openIn), true});
+        actions.push_back({localized("Open in…"), weakly(this, &PreviewController::openIn), true});
     _summary->setActions(actions);
     _screen->setSearching(false);
     _screen->setNote({});
@@ -367,11 +343,10 @@ void PreviewController::showLoadingAfterDelay()
 {
     auto& dispatch = services().dispatch();
     dispatch.after(
-        loadingDelay, dispatch.mainQueue(), [weak = std::weak_ptr(self()), generation = _generation] {
-            const auto screen = weak.lock();
-            if (screen && screen->_generation == generation && !screen->_content && screen->_screen)
-                screen->_screen->setContent(summaryView({.message = localized("Loading…"), .isBusy = true}));
-        });
+        loadingDelay, dispatch.mainQueue(), weakly(this, [generation = _generation](PreviewController& self) {
+            if (self._generation == generation && !self._content && self._screen)
+                self._screen->setContent(summaryView({.message = localized("Loading…"), .isBusy = true}));
+        }));
 }
 
 void PreviewController::beginSearch()

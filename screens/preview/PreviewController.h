@@ -22,6 +22,7 @@ namespace platform {
 class ItemDownload;
 class OperationQueue;
 struct DownloadProgress;
+struct PageMark;
 } // namespace platform
 
 namespace kit {
@@ -115,6 +116,7 @@ private:
     void editingBegan(const Result<std::shared_ptr<PreviewEditing>>& begun);
     void showEditBars();
     void connectPages();
+    void showNote(const std::optional<PageMark>& mark);
     void removeEditor();
     void leaveEditing(const std::optional<Url>& newItem = std::nullopt);
     void keep(const std::shared_ptr<PreviewEditing>& editing);
@@ -125,12 +127,13 @@ private:
     void showOnDisk(const std::shared_ptr<PreviewEditing>& editing);
     void askAfterFailure(const std::shared_ptr<PreviewEditing>& editing, const EditsKept& outcome);
     void followChange();
+    void itemChecked(const std::shared_ptr<PreviewEditing>& editing, bool isChanged);
     void programEnds();
     void alert(const std::shared_ptr<kit::ViewController>& alert);
     bool shouldSave(const Url& item);
     void startAgain();
     void openIn();
-    std::function<void()> calling(void (PreviewController::*action)());
+    void updateBars();
     void showNothing();
     void showLoadingAfterDelay();
     void forgetContent();

@@ -5,6 +5,7 @@
 
 #include "kit/views/Button.h"
 #include "platform/Localization.h"
+#include "platform/Weakly.h"
 #include "screens/PlatformNames.h"
 
 #include <algorithm>
@@ -34,14 +35,12 @@ void PreviewEditBar::build()
         {EditTool::NextField, "go-down-symbolic", localized("Next field")},
         {EditTool::Done, nullptr, localized("Done")},
     };
-    const auto self = std::static_pointer_cast<PreviewEditBar>(shared_from_this());
     for (const auto& [tool, icon, name] : tools) {
         const auto button = std::make_shared<kit::Button>(
-            icon ? std::string() : name, [weak = std::weak_ptr(self), pressed = tool] {
-                const auto bar = weak.lock();
-                if (const auto call = bar ? bar->_onTool : nullptr)
+            icon ? std::string() : name, weakly(this, [pressed = tool](PreviewEditBar& self) {
+                if (const auto call = self._onTool)
                     call(pressed);
-            });
+            }));
         if (icon)
             button->setImage(Image::named(icon));
         else

@@ -6,6 +6,7 @@
 #include "kit/views/Button.h"
 #include "kit/views/TextField.h"
 #include "platform/Localization.h"
+#include "platform/Weakly.h"
 #include "screens/AlertParts.h"
 #include "screens/PlatformNames.h"
 #include "screens/preview/NoteView.h"
@@ -75,29 +76,13 @@ PreviewEditor::~PreviewEditor()
 
 void PreviewEditor::connect()
 {
-    const std::weak_ptr<PreviewEditor> weak = shared_from_this();
-    const auto calling = [weak](Step step) {
-        return [weak, step] {
-            if (const auto editor = weak.lock())
-                ((*editor).*step)();
-        };
-    };
-    _bar->setOnTool([weak](EditTool tool) {
-        if (const auto editor = weak.lock())
-            editor->use(tool);
-    });
-    _fieldBar->setOnPress(calling(&PreviewEditor::pressField));
-    _fieldBar->setOnLeave(calling(&PreviewEditor::finishWriting));
-    _fieldBar->setOnNext([weak] {
-        if (const auto editor = weak.lock())
-            editor->use(EditTool::NextField);
-    });
+    _bar->setOnTool(weakly(this, &PreviewEditor::use));
+    _fieldBar->setOnPress(weakly(this, &PreviewEditor::pressField));
+    _fieldBar->setOnLeave(weakly(this, &PreviewEditor::finishWriting));
+    _fieldBar->setOnNext(weakly(this, &PreviewEditor::use, EditTool::NextField));
     if (const auto pages = _pages.lock()) {
-        pages->setOnUndo(calling(&PreviewEditor::undo));
-        pages->setOnTap([weak](const PreviewPagesView::PagePlace& place) {
-            if (const auto editor = weak.lock())
-                editor->tapped(place);
-        });
+        pages->setOnUndo(weakly(this, &PreviewEditor::undo));
+        pages->setOnTap(weakly(this, &PreviewEditor::tapped));
     }
     readFields();
     update();
@@ -148,10 +133,7 @@ void PreviewEditor::use(EditTool tool)
 
 void PreviewEditor::apply(PageEdit edit)
 {
-    _editing->apply(std::move(edit), [weak = weak_from_this()](const std::optional<Error>& error) {
-        if (const auto editor = weak.lock())
-            editor->changed(error);
-    });
+    _editing->apply(std::move(edit), weakly(this, &PreviewEditor::changed));
     update();
 }
 
@@ -161,10 +143,7 @@ void PreviewEditor::undo()
         return;
     // A text that is still being written is the latest edit, so it is finished first and then undone.
     finishWriting();
-    _editing->undo([weak = weak_from_this()](const std::optional<Error>& error) {
-        if (const auto editor = weak.lock())
-            editor->changed(error);
-    });
+    _editing->undo(weakly(this, &PreviewEditor::changed));
     update();
 }
 
@@ -183,16 +162,18 @@ void PreviewEditor::readFields()
 {
     if (!_rights.canFillForms)
         return;
-    _editing->readFields([weak = weak_from_this()](std::vector<FormField> fields) {
-        const auto editor = weak.lock();
-        const auto pages = editor ? editor->_pages.lock() : nullptr;
-        if (!pages)
-            return;
-        pages->setFields(std::move(fields));
-        if (const auto* field = pages->activeField())
-            editor->_fieldBar->setField(*field);
-        editor->update();
-    });
+    _editing->readFields(weakly(this, &PreviewEditor::showFields));
+}
+
+void PreviewEditor::showFields(std::vector<FormField> fields)
+{
+    const auto pages = _pages.lock();
+    if (!pages)
+        return;
+    pages->setFields(std::move(fields));
+    if (const auto* field = pages->activeField())
+        _fieldBar->setField(*field);
+    update();
 }
 
 void PreviewEditor::mark(PageMark::Kind kind)
@@ -294,11 +275,11 @@ void PreviewEditor::fillIn(const FormField& field)
     if (field.kind == Kind::Choice)
         choose(field);
     else if (field.isMultiline)
-        askForText(fieldName(field), field.text, [weak = weak_from_this(), field](const std::string& text) {
-            const auto editor = weak.lock();
-            if (editor && text != field.text)
-                editor->apply(FieldTextEdit{field.page, field.id, text});
-        });
+        askForText(
+            fieldName(field), field.text, weakly(this, [field](PreviewEditor& self, const std::string& text) {
+                if (text != field.text)
+                    self.apply(FieldTextEdit{field.page, field.id, text});
+            }));
     else if (field.kind == Kind::CheckBox)
         apply(FieldStateEdit{field.page, field.id, !field.isOn});
     else if (field.kind == Kind::RadioButton && !field.isOn)
@@ -309,13 +290,6 @@ void PreviewEditor::choose(const FormField& field)
 {
     const auto sheet =
         std::make_shared<kit::AlertController>(fieldName(field), std::string(), kit::AlertStyle::ActionSheet);
-    const std::weak_ptr<PreviewEditor> weak = weak_from_this();
-    const auto applying = [weak](const PageEdit& edit) {
-        return [weak, edit] {
-            if (const auto editor = weak.lock())
-                editor->apply(edit);
-        };
-    };
     for (std::size_t i = 0; i < field.options.size(); ++i) {
         const bool isChosen = std::ranges::count(field.chosen, i) > 0;
         auto chosen = field.takesSeveral ? field.chosen : std::vector<std::size_t>();
@@ -324,21 +298,23 @@ void PreviewEditor::choose(const FormField& field)
             chosen.push_back(i);
         std::ranges::sort(chosen);
         sheet->addAction(alertAction((isChosen ? "✓ " : "") + field.options[i],
-            kit::AlertActionStyle::Default, applying(FieldChoiceEdit{field.page, field.id, chosen})));
+            kit::AlertActionStyle::Default,
+            weakly(this, &PreviewEditor::apply, PageEdit(FieldChoiceEdit{field.page, field.id, chosen}))));
     }
     if (field.takesOtherWords)
-        sheet->addAction(alertAction(localized("Other…"), kit::AlertActionStyle::Default, [weak, field] {
-            const auto editor = weak.lock();
-            if (!editor)
-                return;
-            editor->askForText(fieldName(field), field.text, [weak, field](const std::string& text) {
-                if (const auto asked = weak.lock())
-                    asked->apply(FieldTextEdit{field.page, field.id, text});
-            });
-        }));
+        sheet->addAction(alertAction(localized("Other…"), kit::AlertActionStyle::Default,
+            weakly(this, &PreviewEditor::askForOtherWords, field)));
     sheet->addAction(alertAction(localized("Cancel"), kit::AlertActionStyle::Cancel));
     sheet->setPopoverAnchor(kit::ViewAnchor{_fieldBar->button(), _fieldBar->button()->bounds()});
     _callbacks.present(sheet);
+}
+
+void PreviewEditor::askForOtherWords(const FormField& field)
+{
+    askForText(
+        fieldName(field), field.text, weakly(this, [field](PreviewEditor& self, const std::string& text) {
+            self.apply(FieldTextEdit{field.page, field.id, text});
+        }));
 }
 
 void PreviewEditor::tapped(const PreviewPagesView::PagePlace& place)
@@ -356,11 +332,11 @@ void PreviewEditor::tapped(const PreviewPagesView::PagePlace& place)
     }
     if (_hasField)
         endField();
-    pages->findMark(place, [weak = weak_from_this(), page = place.page](const auto& mark) {
-        const auto editor = weak.lock();
-        if (editor && mark)
-            editor->showMark(page, *mark);
-    });
+    pages->findMark(
+        place, weakly(this, [page = place.page](PreviewEditor& self, const std::optional<PageMark>& mark) {
+            if (mark)
+                self.showMark(page, *mark);
+        }));
 }
 
 void PreviewEditor::placeNote(const PreviewPagesView::PagePlace& place)
@@ -368,13 +344,12 @@ void PreviewEditor::placeNote(const PreviewPagesView::PagePlace& place)
     const auto pages = _pages.lock();
     pages->setPlacing(false);
     _callbacks.layoutDidChange();
-    askForText(localized("Note"), {}, [weak = weak_from_this(), place](const std::string& text) {
-        const auto editor = weak.lock();
-        if (!editor || text.empty())
+    askForText(localized("Note"), {}, weakly(this, [place](PreviewEditor& self, const std::string& text) {
+        if (text.empty())
             return;
         const Rect there{place.point.x - noteSide / 2, place.point.y - noteSide / 2, noteSide, noteSide};
-        editor->apply(NewMarkEdit{place.page, PageMark::Kind::Note, {there}, text});
-    });
+        self.apply(NewMarkEdit{place.page, PageMark::Kind::Note, {there}, text});
+    }));
 }
 
 void PreviewEditor::askForText(
@@ -397,25 +372,23 @@ void PreviewEditor::showMark(std::size_t page, const PageMark& mark)
             _callbacks.present(makeNoteAlert(mark));
         return;
     }
-    const std::weak_ptr<PreviewEditor> weak = weak_from_this();
     const auto alert =
         std::make_shared<kit::AlertController>(markTitle(mark), mark.text, kit::AlertStyle::Alert);
     alert->addAction(alertAction(mark.text.empty() ? localized("Add Comment") : localized("Change Text"),
-        kit::AlertActionStyle::Default, [weak, page, mark] {
-            const auto editor = weak.lock();
-            if (!editor)
-                return;
-            editor->askForText(markTitle(mark), mark.text, [weak, page, mark](const std::string& text) {
-                if (const auto asked = weak.lock(); asked && text != mark.text)
-                    asked->apply(MarkTextEdit{page, mark.id, text});
-            });
-        }));
-    alert->addAction(alertAction(localized("Remove"), kit::AlertActionStyle::Destructive, [weak, page, mark] {
-        if (const auto editor = weak.lock())
-            editor->apply(MarkRemoval{page, mark.id});
-    }));
+        kit::AlertActionStyle::Default, weakly(this, &PreviewEditor::askForWords, page, mark)));
+    alert->addAction(alertAction(localized("Remove"), kit::AlertActionStyle::Destructive,
+        weakly(this, &PreviewEditor::apply, PageEdit(MarkRemoval{page, mark.id}))));
     alert->addAction(alertAction(localized("Cancel"), kit::AlertActionStyle::Cancel));
     _callbacks.present(alert);
+}
+
+void PreviewEditor::askForWords(std::size_t page, const PageMark& mark)
+{
+    askForText(
+        markTitle(mark), mark.text, weakly(this, [page, mark](PreviewEditor& self, const std::string& text) {
+            if (text != mark.text)
+                self.apply(MarkTextEdit{page, mark.id, text});
+        }));
 }
 
 } // namespace screens

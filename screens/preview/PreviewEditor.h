@@ -49,25 +49,27 @@ public:
     bool backRequested();
 
 private:
-    using Step = void (PreviewEditor::*)();
     void connect();
     void use(EditTool tool);
     void apply(PageEdit edit);
     void undo();
     void changed(const std::optional<Error>& error);
     void readFields();
+    void showFields(std::vector<FormField> fields);
     void mark(PageMark::Kind kind);
     void stepField(int direction);
     void show(const FormField& field);
     void endField();
     void pressField();
     void choose(const FormField& field);
+    void askForOtherWords(const FormField& field);
     void tapped(const PreviewPagesView::PagePlace& place);
     void fillIn(const FormField& field);
     void placeNote(const PreviewPagesView::PagePlace& place);
     void askForText(
         const std::string& title, const std::string& text, std::function<void(const std::string&)> written);
     void showMark(std::size_t page, const PageMark& mark);
+    void askForWords(std::size_t page, const PageMark& mark);
 
     std::shared_ptr<PreviewEditing> _editing;
     std::weak_ptr<PreviewPagesView> _pages;

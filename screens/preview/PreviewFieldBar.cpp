@@ -6,6 +6,7 @@
 #include "kit/views/Button.h"
 #include "kit/views/TextField.h"
 #include "platform/Localization.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 #include <utility>
@@ -65,17 +66,15 @@ std::shared_ptr<PreviewFieldBar> PreviewFieldBar::create()
 
 void PreviewFieldBar::build()
 {
-    const auto self = std::static_pointer_cast<PreviewFieldBar>(shared_from_this());
     _name = std::make_shared<kit::Label>();
     _name->setFont(kit::Font::preferred(kit::TextStyle::Footnote));
     _text = std::make_shared<kit::TextField>();
     _text->setInputTraits({.returnKey = kit::ReturnKey::Done, .clearButton = kit::ClearButton::WhileEditing});
-    _text->setDelegate(std::shared_ptr<kit::TextFieldDelegate>(self, self.get()));
-    _button = std::make_shared<kit::Button>(std::string(), [weak = std::weak_ptr(self)] {
-        const auto bar = weak.lock();
-        if (const auto call = bar ? bar->_onPress : nullptr)
+    _text->setDelegate(std::shared_ptr<kit::TextFieldDelegate>(shared_from_this(), this));
+    _button = std::make_shared<kit::Button>(std::string(), weakly(this, [](PreviewFieldBar& self) {
+        if (const auto call = self._onPress)
             call();
-    });
+    }));
     for (const auto& part : std::initializer_list<std::shared_ptr<kit::View>>{_name, _text, _button})
         addSubview(part);
 }

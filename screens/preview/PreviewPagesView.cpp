@@ -5,6 +5,7 @@
 
 #include "platform/Dispatch.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 #include <utility>
@@ -33,11 +34,10 @@ void PreviewPagesView::post(std::function<std::function<void(PreviewPagesView&)>
         const auto open = document.lock();
         if (!open)
             return;
-        main->async([weak, generation, answer = work(*open)] {
-            const auto view = weak.lock();
-            if (view && view->_generation == generation)
-                answer(*view);
-        });
+        main->async(weakly(weak, [generation, answer = work(*open)](PreviewPagesView& view) {
+            if (view._generation == generation)
+                answer(view);
+        }));
     });
 }
 

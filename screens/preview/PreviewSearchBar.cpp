@@ -9,6 +9,7 @@
 #include "platform/Dispatch.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "screens/PlatformNames.h"
 #include "screens/preview/PreviewView.h"
 
@@ -44,15 +45,6 @@ std::shared_ptr<PreviewSearchBar> PreviewSearchBar::create()
 
 void PreviewSearchBar::build()
 {
-    const auto self = std::static_pointer_cast<PreviewSearchBar>(shared_from_this());
-    const std::weak_ptr<PreviewSearchBar> weak = self;
-    const auto step = [weak](MatchStep direction) {
-        return [weak, direction] {
-            const auto bar = weak.lock();
-            if (const auto preview = bar ? bar->_preview.lock() : nullptr)
-                preview->showMatch(direction);
-        };
-    };
     _field = std::make_shared<kit::TextField>();
     _field->setPlaceholder(localized("Search in document"));
     _field->setAccessibilityLabel(localized("Search in document"));
@@ -61,37 +53,41 @@ void PreviewSearchBar::build()
         .capitalization = kit::Capitalization::None,
         .autocorrection = kit::Autocorrection::Off,
         .clearButton = kit::ClearButton::WhileEditing});
-    _field->setDelegate(std::shared_ptr<kit::TextFieldDelegate>(self, self.get()));
-    _field->setOnEditingChanged([weak] {
-        if (const auto bar = weak.lock())
-            bar->edited();
-    });
+    _field->setDelegate(std::shared_ptr<kit::TextFieldDelegate>(shared_from_this(), this));
+    _field->setOnEditingChanged(weakly(this, &PreviewSearchBar::edited));
     _count = std::make_shared<kit::Label>();
     _count->setFont(kit::Font::preferred(kit::TextStyle::Footnote));
     _count->setAlignment(kit::TextAlignment::Center);
-    _previous = symbolButton("go-up-symbolic", localized("Previous match"), step(MatchStep::Previous));
-    _next = symbolButton("go-down-symbolic", localized("Next match"), step(MatchStep::Next));
-    _close = symbolButton("window-close-symbolic", localized("End search"), [weak] {
-        const auto bar = weak.lock();
-        if (const auto call = bar ? bar->_onClose : nullptr)
-            call();
-    });
+    _previous = symbolButton("go-up-symbolic", localized("Previous match"),
+        weakly(this, &PreviewSearchBar::showMatch, MatchStep::Previous));
+    _next = symbolButton("go-down-symbolic", localized("Next match"),
+        weakly(this, &PreviewSearchBar::showMatch, MatchStep::Next));
+    _close = symbolButton(
+        "window-close-symbolic", localized("End search"), weakly(this, [](PreviewSearchBar& self) {
+            if (const auto call = self._onClose)
+                call();
+        }));
     for (const auto& part :
         std::initializer_list<std::shared_ptr<kit::View>>{_field, _count, _previous, _next, _close})
         addSubview(part);
     update();
 }
 
+void PreviewSearchBar::showMatch(MatchStep direction)
+{
+    if (const auto preview = _preview.lock())
+        preview->showMatch(direction);
+}
+
 void PreviewSearchBar::edited()
 {
-    const auto self = std::static_pointer_cast<PreviewSearchBar>(shared_from_this());
     auto& dispatch = services().dispatch();
-    dispatch.after(typingPause, dispatch.mainQueue(), [weak = std::weak_ptr(self), edits = ++_edits] {
-        const auto bar = weak.lock();
-        const auto preview = bar && bar->_edits == edits ? bar->_preview.lock() : nullptr;
-        if (preview)
-            preview->setQuery(bar->_field->text());
-    });
+    dispatch.after(
+        typingPause, dispatch.mainQueue(), weakly(this, [edits = ++_edits](PreviewSearchBar& self) {
+            const auto preview = self._edits == edits ? self._preview.lock() : nullptr;
+            if (preview)
+                preview->setQuery(self._field->text());
+        }));
 }
 
 bool PreviewSearchBar::textFieldShouldReturn(kit::TextField& field)

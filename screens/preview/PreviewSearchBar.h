@@ -19,6 +19,7 @@ class TextField;
 namespace screens {
 
 class PreviewView;
+enum class MatchStep;
 
 /// The bar above a previewed document in which the user searches its text: the field, the number of matches,
 /// and buttons for the match before and the match after. Main thread only.
@@ -46,6 +47,7 @@ public:
 private:
     void build();
     void edited();
+    void showMatch(MatchStep direction);
     std::string countText() const;
     bool textFieldShouldReturn(kit::TextField& field) override;
 

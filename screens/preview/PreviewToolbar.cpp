@@ -6,6 +6,7 @@
 #include "kit/views/Button.h"
 #include "kit/views/Label.h"
 #include "platform/Localization.h"
+#include "platform/Weakly.h"
 #include "screens/PlatformNames.h"
 #include "screens/preview/PreviewPagesView.h"
 
@@ -43,27 +44,20 @@ void PreviewToolbar::build()
     for (const auto& part :
         std::initializer_list<std::shared_ptr<kit::View>>{_find, _copy, _page, _edit, _zoomOut, _zoomIn})
         addSubview(part);
-    const auto self = std::static_pointer_cast<PreviewToolbar>(shared_from_this());
-    const auto act = [weak = std::weak_ptr(self)](auto action) {
-        return [weak, action] {
-            if (const auto bar = weak.lock())
-                action(*bar);
-        };
-    };
-    _find->setAction(act([](PreviewToolbar& bar) {
-        if (const auto call = bar._onFind)
+    _find->setAction(weakly(this, [](PreviewToolbar& self) {
+        if (const auto call = self._onFind)
             call();
     }));
-    _copy->setAction(act([](PreviewToolbar& bar) {
-        if (const auto preview = bar._preview.lock())
+    _copy->setAction(weakly(this, [](PreviewToolbar& self) {
+        if (const auto preview = self._preview.lock())
             preview->copy();
     }));
-    _edit->setAction(act([](PreviewToolbar& bar) {
-        if (const auto call = bar._onEdit)
+    _edit->setAction(weakly(this, [](PreviewToolbar& self) {
+        if (const auto call = self._onEdit)
             call();
     }));
-    _zoomOut->setAction(act([](PreviewToolbar& bar) { bar.zoomBy(1 / PreviewView::zoomStep); }));
-    _zoomIn->setAction(act([](PreviewToolbar& bar) { bar.zoomBy(PreviewView::zoomStep); }));
+    _zoomOut->setAction(weakly(this, &PreviewToolbar::zoomBy, 1 / PreviewView::zoomStep));
+    _zoomIn->setAction(weakly(this, &PreviewToolbar::zoomBy, PreviewView::zoomStep));
     update();
 }
 
