@@ -6,6 +6,7 @@
 #include "kit/values/Screen.h"
 #include "kit/views/Label.h"
 #include "platform/Log.h"
+#include "platform/Weakly.h"
 #include "prompts/DriveStatusLabelView.h"
 #include "screens/StorageUpgradeButton.h"
 #include "screens/list/DocumentListController.h"
@@ -16,6 +17,7 @@ using kit::BarButtonItem;
 using kit::Font;
 using kit::SystemItem;
 using platform::Operation;
+using platform::weakly;
 using screens::DocumentListController;
 using screens::StorageUpgradeButton;
 
@@ -66,12 +68,10 @@ void DocumentListControllerStatusBar::configureLabels(const Offer& offer)
 
     const auto button = StorageUpgradeButton::createButton();
     button->setOffer(offer);
-    button->setAction([weak = weak_from_this(), pressed = std::weak_ptr(button)] {
-        const auto self = weak.lock();
-        const auto sender = pressed.lock();
-        if (self && sender)
-            self->upgradeStoragePressed(*sender);
-    });
+    button->setAction(weakly(this, [pressed = std::weak_ptr(button)](DocumentListControllerStatusBar& self) {
+        if (const auto sender = pressed.lock())
+            self.upgradeStoragePressed(*sender);
+    }));
     button->sizeToFit();
     button->setHidden(true);
     _labelsView->setQuotaButton(button);

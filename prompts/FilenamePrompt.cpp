@@ -8,6 +8,7 @@
 #include "kit/layout/LayoutConstraint.h"
 #include "kit/views/TextField.h"
 #include "platform/Localization.h"
+#include "platform/Weakly.h"
 #include "prompts/SimpleTextViewController.h"
 #include "prompts/UIUtils.h"
 
@@ -20,6 +21,8 @@ using kit::AlertActionStyle;
 using kit::AlertController;
 using kit::TextField;
 using platform::localized;
+using platform::weakly;
+using platform::weaklyOr;
 
 namespace {
 
@@ -98,12 +101,9 @@ void FilenamePrompt::addTextField(const Texts& texts)
             .autocorrection = kit::Autocorrection::Off,
             .clearButton = kit::ClearButton::WhileEditing});
         field.setDelegate(weak_from_this());
-        field.setOnEditingChanged([weak = weak_from_this(), edited = field.weak_from_this()] {
-            const auto prompt = weak.lock();
-            const auto view = edited.lock();
-            if (prompt)
-                prompt->folderPromptTextFieldChanged(static_cast<const TextField*>(view.get()));
-        });
+        field.setOnEditingChanged(weakly(this, [edited = field.weak_from_this()](FilenamePrompt& self) {
+            self.folderPromptTextFieldChanged(static_cast<const TextField*>(edited.lock().get()));
+        }));
         field.setPlacedByFrame(false);
         const double height = field.font().lineHeight() * fieldHeightToLineHeight;
         field.anchor(kit::LayoutAttribute::Height).equalToConstant(height)->setActive(true);
@@ -126,10 +126,7 @@ void FilenamePrompt::addDefaultAction(const MaybeText& text)
 {
     _defaultAction = std::make_shared<AlertAction>(
         text && !text->empty() ? *text : localized("Done"), AlertActionStyle::Default);
-    _defaultAction->setShouldClose([weak = weak_from_this()] {
-        const auto prompt = weak.lock();
-        return prompt && prompt->handleDoneAction();
-    });
+    _defaultAction->setShouldClose(weaklyOr(false, this, &FilenamePrompt::handleDoneAction));
     _defaultAction->setEnabled(_origFilename && !_origFilename->empty());
     _alert->addAction(_defaultAction);
 }

@@ -6,6 +6,7 @@
 #include "platform/CloudDocumentService.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 
@@ -14,6 +15,7 @@ namespace tarrow {
 using platform::Notification;
 using platform::Operation;
 using platform::services;
+using platform::weakly;
 
 namespace {
 
@@ -44,16 +46,10 @@ QuotaFetcher::~QuotaFetcher()
 void QuotaFetcher::observeApplication()
 {
     auto& center = services().notificationCenter();
-    _becameActive =
-        center.observe(Notification::ApplicationDidBecomeActive, [weak = weak_from_this()](const auto&) {
-            if (const auto self = weak.lock())
-                self->didBecomeActiveNotification();
-        });
-    _willResignActive =
-        center.observe(Notification::ApplicationWillResignActive, [weak = weak_from_this()](const auto&) {
-            if (const auto self = weak.lock())
-                self->willResignActiveNotification();
-        });
+    _becameActive = center.observe(
+        Notification::ApplicationDidBecomeActive, weakly(this, &QuotaFetcher::didBecomeActiveNotification));
+    _willResignActive = center.observe(
+        Notification::ApplicationWillResignActive, weakly(this, &QuotaFetcher::willResignActiveNotification));
 }
 
 void QuotaFetcher::runWithInterval(double seconds)
@@ -63,18 +59,13 @@ void QuotaFetcher::runWithInterval(double seconds)
     _timer = nullptr;
     const auto period =
         std::chrono::duration_cast<platform::Duration>(std::chrono::duration<double>(seconds));
-    _timer = services().dispatch().startTimer(_queue, period, leeway, [weak = weak_from_this()] {
-        if (const auto self = weak.lock())
-            self->performFetch();
-    });
+    _timer =
+        services().dispatch().startTimer(_queue, period, leeway, weakly(this, &QuotaFetcher::performFetch));
 }
 
 void QuotaFetcher::fetchNow()
 {
-    _queue->async([weak = weak_from_this()] {
-        if (const auto self = weak.lock())
-            self->performFetch();
-    });
+    _queue->async(weakly(this, &QuotaFetcher::performFetch));
 }
 
 void QuotaFetcher::performFetch()
@@ -89,10 +80,7 @@ void QuotaFetcher::performFetch()
             op.warning("can't update quota: %{public}@", *error);
             return;
         }
-        services().dispatch().mainQueue()->async([weak, freeBytes] {
-            if (const auto self = weak.lock())
-                self->notify(freeBytes);
-        });
+        services().dispatch().mainQueue()->async(weakly(weak, &QuotaFetcher::notify, freeBytes));
     });
 }
 
