@@ -8,6 +8,7 @@
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"
+#include "platform/Weakly.h"
 #include "preview/PreviewItemManager.h"
 #include "preview/TarrowDriveAppPreview.h"
 #include "screens/DocumentInteractionSheet.h"
@@ -18,6 +19,7 @@ using kit::BarButtonItem;
 using kit::SystemItem;
 using platform::Operation;
 using platform::Url;
+using platform::weakly;
 using screens::PreviewController;
 using screens::PreviewControllerDataSource;
 using screens::PreviewControllerDelegate;
@@ -36,10 +38,7 @@ std::shared_ptr<LookwellItemController> LookwellItemController::init()
     self.setDataSource(std::shared_ptr<PreviewControllerDataSource>(controller, &self));
     self.setDelegate(std::shared_ptr<PreviewControllerDelegate>(controller, &self));
     self.addButtons();
-    self.setOpenInHandler([weak = std::weak_ptr(controller)](const Url& item, const auto& from) {
-        if (const auto screen = weak.lock())
-            screen->showOtherApps(item, from);
-    });
+    self.setOpenInHandler(weakly(controller, &LookwellItemController::showOtherApps));
     return controller;
 }
 
@@ -47,12 +46,8 @@ LookwellItemController::LookwellItemController() = default;
 
 void LookwellItemController::addButtons()
 {
-    const auto weak = std::weak_ptr(std::static_pointer_cast<LookwellItemController>(shared_from_this()));
-    const auto button = [&](SystemItem symbol, void (LookwellItemController::*action)(const Button&)) {
-        return std::make_shared<BarButtonItem>(symbol, [weak, action](const Button& sender) {
-            if (const auto screen = weak.lock())
-                ((*screen).*action)(sender);
-        });
+    const auto button = [this](SystemItem symbol, void (LookwellItemController::*action)(const Button&)) {
+        return std::make_shared<BarButtonItem>(symbol, weakly(this, action));
     };
     setAdditionalRightBarButtonItems(
         {button(SystemItem::Trash, &LookwellItemController::showWarningAndDeleteDocument),

@@ -14,6 +14,7 @@
 #include "kit/views/Button.h"
 #include "kit/views/ScrollView.h"
 #include "platform/Log.h"
+#include "platform/Weakly.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
 #include "screens/DocumentInteractionSheet.h"
@@ -30,6 +31,7 @@ using kit::SizeClass;
 using kit::SystemItem;
 using kit::View;
 using platform::Operation;
+using platform::weakly;
 using screens::DocumentInteractionSheet;
 
 namespace {
@@ -181,11 +183,7 @@ void PreviewBaseViewController::enableButtons()
 PreviewBaseViewController::Button PreviewBaseViewController::makeButton(
     SystemItem symbol, void (PreviewBaseViewController::*action)(const Button&))
 {
-    return std::make_shared<BarButtonItem>(
-        symbol, [weak = std::weak_ptr(self()), action](const Button& sender) {
-            if (const auto screen = weak.lock())
-                ((*screen).*action)(sender);
-        });
+    return std::make_shared<BarButtonItem>(symbol, weakly(this, action));
 }
 
 PreviewBaseViewController::Button PreviewBaseViewController::wrappedOpenInButton()
@@ -193,10 +191,7 @@ PreviewBaseViewController::Button PreviewBaseViewController::wrappedOpenInButton
     const auto button = openInAppNavControllerButton();
     if (!button)
         return nullptr;
-    button->setAction([weak = std::weak_ptr(self())] {
-        if (const auto screen = weak.lock())
-            screen->openInDefaultApp();
-    });
+    button->setAction(weakly(this, &PreviewBaseViewController::openInDefaultApp));
     button->sizeToFit();
     return std::make_shared<BarButtonItem>(button);
 }

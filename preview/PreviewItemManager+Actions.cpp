@@ -9,6 +9,7 @@
 #include "platform/Dispatch.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
 
@@ -17,6 +18,7 @@ namespace tarrow {
 using platform::Operation;
 using platform::services;
 using platform::Url;
+using platform::weakly;
 using screens::MoveTargetPicker;
 using screens::MoveTargetScope;
 
@@ -77,10 +79,9 @@ void PreviewItemManager::removeItem(const Screen& screen)
         const auto error = FileUtils::remove(url);
         if (!error)
             return;
-        main->async([weak, screen, error = *error] {
-            if (const auto self = weak.lock())
-                UIUtils::showErrorParentViewController(error, self->screenForAlerts(screen.lock()));
-        });
+        main->async(weakly(weak, [screen, error = *error](PreviewItemManager& self) {
+            UIUtils::showErrorParentViewController(error, self.screenForAlerts(screen.lock()));
+        }));
     });
 }
 
@@ -116,15 +117,14 @@ void PreviewItemManager::documentTargetSelectionControllerDidSelectItemAtURL(
             auto errors = moveAll(moves);
             if (errors.empty())
                 return;
-            main->async([weak, errors = std::move(errors)] {
-                const auto self = weak.lock();
-                const auto navigation = self ? self->navigationController() : nullptr;
+            main->async(weakly(weak, [errors = std::move(errors)](PreviewItemManager& self) {
+                const auto navigation = self.navigationController();
                 for (const auto& error : errors) {
                     if (navigation)
                         UIUtils::showFriendlyMoveErrorParentViewController(
                             error, navigation->topViewController());
                 }
-            });
+            }));
         });
 }
 

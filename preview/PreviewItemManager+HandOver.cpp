@@ -11,6 +11,7 @@
 #include "platform/Dispatch.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "preview/PreviewItemManager.h"
 
 namespace tarrow {
@@ -19,6 +20,7 @@ using platform::Operation;
 using platform::Result;
 using platform::services;
 using platform::UserActivity;
+using platform::weakly;
 
 namespace {
 
@@ -58,11 +60,11 @@ void PreviewItemManager::registerBatonneActivity()
                 op.error("RZBookmarkableStringFromDocumentURL returned empty bookmark");
                 return;
             }
-            main->async([weak, bookmark = *answer.value] {
+            main->async(weakly(weak, [bookmark = *answer.value](PreviewItemManager& self) {
                 // Making the bookmark may have taken long, and the item may no longer be presented.
-                if (const auto self = weak.lock(); self && self->filePresenterRegistered())
-                    self->registerBatonneActivityForBookmark(bookmark);
-            });
+                if (self.filePresenterRegistered())
+                    self.registerBatonneActivityForBookmark(bookmark);
+            }));
         });
 }
 

@@ -9,6 +9,7 @@
 #include "platform/FileCoordinator.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewDetailsViewController.h"
 #include "preview/PreviewItemManager.h"
@@ -18,6 +19,7 @@ namespace tarrow {
 using platform::Operation;
 using platform::services;
 using platform::Url;
+using platform::weakly;
 
 namespace {
 
@@ -91,14 +93,11 @@ void PreviewItemManager::presentedItemDidChange()
             return;
     }
     auto& dispatch = services().dispatch();
-    dispatch.after(refreshDelay, dispatch.mainQueue(), [weak = weak_from_this()] {
-        const auto self = weak.lock();
-        if (!self)
-            return;
-        if (const auto url = self->itemURL())
-            self->refreshItem(*url);
-        self->clearRefreshPending();
-    });
+    dispatch.after(refreshDelay, dispatch.mainQueue(), weakly(this, [](PreviewItemManager& self) {
+        if (const auto url = self.itemURL())
+            self.refreshItem(*url);
+        self.clearRefreshPending();
+    }));
 }
 
 void PreviewItemManager::refreshItem(const Url& url)
@@ -147,10 +146,7 @@ void PreviewItemManager::presentedItemDidMoveToURL(const Url& newURL)
         op.warning("UNEXPECTED: duplicate calls to presentedItemDidMoveToURL: %@", real.path());
         return;
     }
-    services().dispatch().mainQueue()->async([weak = weak_from_this(), real] {
-        if (const auto self = weak.lock())
-            self->followTo(real);
-    });
+    services().dispatch().mainQueue()->async(weakly(this, &PreviewItemManager::followTo, real));
 }
 
 /// Follows the item to its new place. A preview in a peek is only kept ready, because the user did not ask to
@@ -173,10 +169,7 @@ void PreviewItemManager::accommodatePresentedItemDeletionWithCompletionHandler(C
     op.info("Accommodate deletion: %@", itemURL());
     completion(std::nullopt);
     unregisterAsFilePresenter();
-    services().dispatch().mainQueue()->async([weak = weak_from_this()] {
-        if (const auto self = weak.lock())
-            self->popPreview();
-    });
+    services().dispatch().mainQueue()->async(weakly(this, &PreviewItemManager::popPreview));
 }
 
 /// Takes the preview off the stack. A preview that was only prepared, or was left meanwhile, has no screen
@@ -197,10 +190,8 @@ void PreviewItemManager::accommodatePresentedSubitemDeletionAtURLCompletionHandl
     completion(std::nullopt);
     unregisterAsFilePresenter();
     auto& dispatch = services().dispatch();
-    dispatch.after(refreshDelay, dispatch.mainQueue(), [weak = weak_from_this()] {
-        if (const auto self = weak.lock())
-            self->refreshAfterSubitemDeletion();
-    });
+    dispatch.after(
+        refreshDelay, dispatch.mainQueue(), weakly(this, &PreviewItemManager::refreshAfterSubitemDeletion));
 }
 
 void PreviewItemManager::refreshAfterSubitemDeletion()

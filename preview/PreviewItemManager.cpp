@@ -13,6 +13,7 @@
 #include "platform/FileSystem.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewDetailsViewController.h"
 #include "screens/DocumentInteractionSheet.h"
@@ -29,6 +30,7 @@ using platform::Notification;
 using platform::Operation;
 using platform::services;
 using platform::Url;
+using platform::weakly;
 using screens::DocumentListController;
 
 namespace {
@@ -127,11 +129,7 @@ void PreviewItemManager::keepItem(const std::shared_ptr<DRItem>& item)
 void PreviewItemManager::observeApplication()
 {
     const auto observe = [this](Notification notification, void (PreviewItemManager::*handle)()) {
-        _observations.push_back(services().notificationCenter().observe(
-            notification, [weak = weak_from_this(), handle](const auto&) {
-                if (const auto self = weak.lock())
-                    ((*self).*handle)();
-            }));
+        _observations.push_back(services().notificationCenter().observe(notification, weakly(this, handle)));
     };
     observe(Notification::ApplicationDidBecomeActive, &PreviewItemManager::didBecomeActiveNotification);
     observe(Notification::ApplicationWillResignActive, &PreviewItemManager::willResignActiveNotification);
@@ -236,10 +234,7 @@ void PreviewItemManager::replaceLastViewController(const Screen& screen)
         navigation->setViewControllers(std::move(stack), false);
         return;
     }
-    const auto push = [weak = std::weak_ptr(navigation), screen] {
-        if (const auto controller = weak.lock())
-            controller->pushViewController(screen, true);
-    };
+    const auto push = weakly(navigation, &NavigationController::pushViewController, screen, true);
     if (std::dynamic_pointer_cast<SearchPresentation>(navigation->presentedViewController()))
         navigation->dismissViewController(true, push);
     else
