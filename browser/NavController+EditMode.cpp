@@ -14,6 +14,7 @@
 #include "platform/Localization.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "screens/list/DocumentListController.h"
 
 namespace tarrow {
@@ -24,6 +25,7 @@ using platform::ByteCountStyle;
 using platform::ByteCountUnit;
 using platform::Operation;
 using platform::services;
+using platform::weakly;
 using screens::DocumentListAction;
 using screens::DocumentListController;
 
@@ -59,25 +61,18 @@ void NavController::initNewListController(const List& list)
 
 void NavController::configureNavBar(const List& list)
 {
-    const auto calling = [weak = std::weak_ptr(self())](void (NavController::*operation)(const Sender&)) {
-        return [weak, operation](const Sender& sender) {
-            if (const auto browser = weak.lock())
-                (*browser.*operation)(sender);
-        };
-    };
     const auto button = _editMode
-        ? std::make_shared<BarButtonItem>(SystemItem::Cancel, calling(&NavController::endEditMode))
+        ? std::make_shared<BarButtonItem>(SystemItem::Cancel, weakly(this, &NavController::endEditMode))
         : std::make_shared<BarButtonItem>(
-            platform::localized("Select"), calling(&NavController::beginEditMode));
+            platform::localized("Select"), weakly(this, &NavController::beginEditMode));
     if (!_editMode)
         button->setCompactImage(platform::Image::named("selection-mode-symbolic"));
     list->navigationItem().setRightItem(button);
-    list->navigationItem().setNewAction([weak = std::weak_ptr(self()), shown = std::weak_ptr(list)] {
-        const auto browser = weak.lock();
+    list->navigationItem().setNewAction(weakly(this, [shown = std::weak_ptr(list)](NavController& self) {
         const auto folder = shown.lock();
-        if (browser && folder && MenuEnableChecks::canEnableNewFolderForSelectedItems(*folder))
-            browser->promtForNewFolderAndCreate(nullptr);
-    });
+        if (folder && MenuEnableChecks::canEnableNewFolderForSelectedItems(*folder))
+            self.promtForNewFolderAndCreate(nullptr);
+    }));
     list->navigationItem().setHidesBackButton(_editMode);
     list->setTitle(_editMode ? platform::localized("Select Items") : _viewTitle);
 }
@@ -88,10 +83,9 @@ NavController::Sender NavController::makeToolbarButton(
     const auto button = std::make_shared<kit::Button>(title);
     button->sizeToFit();
     auto item = std::make_shared<BarButtonItem>(button);
-    button->setAction([weak = std::weak_ptr(self()), sender = std::weak_ptr(item), operation] {
-        if (const auto browser = weak.lock())
-            (*browser.*operation)(sender.lock());
-    });
+    button->setAction(weakly(this, [sender = std::weak_ptr(item), operation](NavController& self) {
+        (self.*operation)(sender.lock());
+    }));
     return item;
 }
 

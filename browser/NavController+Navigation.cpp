@@ -14,6 +14,7 @@
 #include "platform/Localization.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
@@ -23,6 +24,7 @@
 
 namespace tarrow {
 
+using platform::weakly;
 using screens::DocumentListController;
 
 namespace {
@@ -177,11 +179,10 @@ void NavController::startSearch(const std::string& query)
     dismissPresentedScreen();
     popToRootViewController(false);
     auto& dispatch = services().dispatch();
-    dispatch.after(searchDelay, dispatch.mainQueue(), [weak = std::weak_ptr(self()), query] {
-        const auto browser = weak.lock();
-        if (const auto list = browser ? browser->getTopDocumentListController() : nullptr)
+    dispatch.after(searchDelay, dispatch.mainQueue(), weakly(this, [query](NavController& self) {
+        if (const auto list = self.getTopDocumentListController())
             list->startSearchWithQueryStringBecomeFirstResponder(query, true);
-    });
+    }));
 }
 
 void NavController::documentListControllerDidSelectContainerWithViewController(
@@ -242,10 +243,7 @@ void NavController::showVanishedItem(const Url& url)
     const auto top = topViewController();
     UIUtils::showErrorParentViewController(vanished(url), top ? top : self());
     // This runs later, so that the list first ends its handling of the tap.
-    services().dispatch().mainQueue()->async([weak = std::weak_ptr(self())] {
-        if (const auto browser = weak.lock())
-            browser->setupInitialViewController();
-    });
+    services().dispatch().mainQueue()->async(weakly(this, &NavController::setupInitialViewController));
 }
 
 void NavController::openFolder(const Url& url, const Operation& op)
@@ -264,10 +262,9 @@ void NavController::openDocument(const std::shared_ptr<DRItem>& item, const Oper
     }
     op.debug("openInDefaultApp returned NO, showing preview");
     // This runs later, so that the list first ends its handling of the tap.
-    services().dispatch().mainQueue()->async([weak = std::weak_ptr(self()), item] {
-        if (const auto browser = weak.lock())
-            browser->showPreviewPreviewMode(item, item->canPreview() ? PreviewModeQuick : PreviewModeDetails);
-    });
+    services().dispatch().mainQueue()->async(weakly(this, [item](NavController& self) {
+        self.showPreviewPreviewMode(item, item->canPreview() ? PreviewModeQuick : PreviewModeDetails);
+    }));
 }
 
 void NavController::documentListControllerItemsChanged(const List& list)

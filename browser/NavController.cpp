@@ -15,6 +15,7 @@
 #include "platform/StateCoder.h"
 #include "platform/StorageOffers.h"
 #include "platform/UserDefaults.h"
+#include "platform/Weakly.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
 #include "screens/UnavailableScreen.h"
@@ -24,6 +25,7 @@
 namespace tarrow {
 
 using platform::Notification;
+using platform::weakly;
 using screens::DocumentListController;
 using screens::UnavailableScreen;
 using screens::UpgradeFlow;
@@ -62,10 +64,7 @@ void NavController::viewDidLoad()
     setupInitialViewController();
     NavigationController::viewDidLoad();
     _observations.push_back(services().notificationCenter().observe(
-        Notification::StorageOfferDidChange, [weak = std::weak_ptr(self())](const auto&) {
-            if (const auto browser = weak.lock())
-                browser->offerChangedNotification();
-        }));
+        Notification::StorageOfferDidChange, weakly(this, &NavController::offerChangedNotification)));
     auto& offers = services().storageOfferManager();
     if (!offers.fetchOfferIfNeeded())
         _upgradeOffer = offers.currentOffer();
@@ -75,16 +74,10 @@ void NavController::viewDidLoad()
 void NavController::observeAccount()
 {
     auto& center = services().notificationCenter();
-    _observations.push_back(
-        center.observe(Notification::ApplicationDidBecomeActive, [weak = std::weak_ptr(self())](const auto&) {
-            if (const auto browser = weak.lock())
-                browser->didBecomeActiveNotification();
-        }));
-    _observations.push_back(
-        center.observe(Notification::CloudIdentityDidChange, [weak = std::weak_ptr(self())](const auto&) {
-            if (const auto browser = weak.lock())
-                browser->tarrowAccountAvailabilityChanged();
-        }));
+    _observations.push_back(center.observe(
+        Notification::ApplicationDidBecomeActive, weakly(this, &NavController::didBecomeActiveNotification)));
+    _observations.push_back(center.observe(Notification::CloudIdentityDidChange,
+        weakly(this, &NavController::tarrowAccountAvailabilityChanged)));
 }
 
 bool NavController::checkTarrowState() const
@@ -131,10 +124,10 @@ void NavController::setupUnavailableScreen()
     } else {
         op.error("_DriveUnavailableScreen creation failed");
         // This runs later, so that the alert comes after the caller's own changes of the stack.
-        services().dispatch().mainQueue()->async([weak = std::weak_ptr(self())] {
+        services().dispatch().mainQueue()->async(weakly(this, [](NavController& self) {
             UIUtils::showAlertMessageParentViewController(
-                {}, platform::localized("Tarrow is not enabled"), weak.lock());
-        });
+                {}, platform::localized("Tarrow is not enabled"), self.self());
+        }));
     }
     dropItemManager();
     setToolbarHidden(true);
@@ -211,11 +204,10 @@ void NavController::offerChangedNotification()
 void NavController::fetchQuotaAfter(int seconds)
 {
     auto& dispatch = services().dispatch();
-    dispatch.after(std::chrono::seconds(seconds), dispatch.mainQueue(), [weak = std::weak_ptr(self())] {
-        const auto browser = weak.lock();
-        if (browser && browser->quotaFetcher())
-            browser->quotaFetcher()->fetchNow();
-    });
+    dispatch.after(std::chrono::seconds(seconds), dispatch.mainQueue(), weakly(this, [](NavController& self) {
+        if (self.quotaFetcher())
+            self.quotaFetcher()->fetchNow();
+    }));
 }
 
 void NavController::upgradeStorageButtonPressed()
