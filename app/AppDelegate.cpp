@@ -15,6 +15,7 @@
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/UserDefaults.h"
+#include "platform/Weakly.h"
 #include "preview/PreviewMode.h"
 
 namespace tarrow {
@@ -23,6 +24,7 @@ using kit::Window;
 using platform::Application;
 using platform::ShortcutItem;
 using platform::UserActivity;
+using platform::weakly;
 
 namespace {
 
@@ -88,10 +90,7 @@ bool AppDelegate::warpTo(const std::optional<Url>& url, int previewMode)
 
 void AppDelegate::warpLater(const Url& url)
 {
-    services().dispatch().mainQueue()->async([weak = weak_from_this(), url] {
-        if (const auto self = weak.lock())
-            self->warpTo(url, PreviewModeQuick);
-    });
+    services().dispatch().mainQueue()->async(weakly(this, &AppDelegate::warpTo, url, PreviewModeQuick));
 }
 
 bool AppDelegate::applicationWillFinishLaunchingWithOptions(
@@ -238,10 +237,8 @@ void AppDelegate::openHandedOverDocument(const UserActivity& activity)
                 return;
             op.info("Batonne document URL: %@", *result.value);
             // The delegate is locked only on the main queue, so that it is never destroyed on this thread.
-            services().dispatch().mainQueue()->async([weak, url = *result.value] {
-                if (const auto self = weak.lock())
-                    self->warpTo(url, PreviewModeQuick);
-            });
+            services().dispatch().mainQueue()->async(
+                weakly(weak, &AppDelegate::warpTo, *result.value, PreviewModeQuick));
         });
 }
 
