@@ -5,6 +5,7 @@
 
 #include "host/gtk/base/CairoCanvas.h"
 #include "host/gtk/base/GestureFeed.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 
@@ -15,6 +16,7 @@ using kit::ViewChange;
 using kit::ViewChanges;
 using platform::Point;
 using platform::Size;
+using platform::weakly;
 
 namespace {
 
@@ -204,16 +206,12 @@ void ViewPeer::dropFocus()
 void ViewPeer::viewWantsFocus(View&, bool focus)
 {
     // This runs later, because the view may be new and its widget not in the window yet.
-    const std::weak_ptr<ViewPeer> weak = weak_from_this();
-    _context->scheduler().schedule(&_native, [weak, focus] {
-        const auto self = weak.lock();
-        if (!self)
-            return;
+    _context->scheduler().schedule(&_native, weakly(this, [focus](ViewPeer& self) {
         if (focus)
-            self->grabFocus();
+            self.grabFocus();
         else
-            self->dropFocus();
-    });
+            self.dropFocus();
+    }));
 }
 
 Size ViewPeer::canvasNaturalSize(double forWidth)

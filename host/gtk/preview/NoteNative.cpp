@@ -4,6 +4,7 @@
 #include "host/gtk/preview/NoteNative.h"
 
 #include "host/gtk/base/Signal.h"
+#include "platform/Weakly.h"
 #include "screens/preview/NoteView.h"
 
 #include <gtk/gtk.h>
@@ -53,10 +54,8 @@ GtkWidget* makeText(const std::shared_ptr<NoteView>& note)
     gtk_accessible_update_property(
         GTK_ACCESSIBLE(text), GTK_ACCESSIBLE_PROPERTY_LABEL, note->accessibility().label.c_str(), -1);
     SignalConnections connections;
-    connections.push_back(connectSignal<void()>(buffer, "changed", [buffer, weak = std::weak_ptr(note)] {
-        if (const auto edited = weak.lock())
-            edited->userEdited(textOf(buffer));
-    }));
+    connections.push_back(connectSignal<void()>(buffer, "changed",
+        platform::weakly(note, [buffer](NoteView& edited) { edited.userEdited(textOf(buffer)); })));
     keep(text, std::move(connections));
     return text;
 }

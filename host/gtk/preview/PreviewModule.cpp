@@ -7,6 +7,7 @@
 #include "platform/Dispatch.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 
 #include <dlfcn.h>
 
@@ -70,12 +71,8 @@ void PreviewModule::loadOnWorker()
     auto& dispatch = platform::services().dispatch();
     _queue = dispatch.makeSerialQueue("preview libraries");
     _queue->async([weak = weak_from_this(), main = dispatch.mainQueue()] {
-        if (const auto self = weak.lock())
-            self->load();
-        main->async([weak] {
-            if (const auto self = weak.lock())
-                self->answerAll();
-        });
+        platform::weakly(weak, &PreviewModule::load)();
+        main->async(platform::weakly(weak, &PreviewModule::answerAll));
     });
 }
 

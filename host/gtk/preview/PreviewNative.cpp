@@ -6,6 +6,7 @@
 #include "host/gtk/preview/PagesNative.h"
 #include "host/gtk/preview/PictureNative.h"
 #include "host/gtk/preview/PreviewModule.h"
+#include "platform/Weakly.h"
 #include "screens/preview/PreviewMediaView.h"
 #include "screens/preview/PreviewTextView.h"
 
@@ -61,13 +62,13 @@ void addModuleMaker(PeerContext& context, const std::shared_ptr<PreviewModule>& 
 {
     addMaker<View>(
         context, [previews, make](const ObjectRef<GtkWidget>& holder, const std::shared_ptr<View>& view) {
-            previews->whenLoaded([holder, make, weak = std::weak_ptr(view)](const auto& libraries) {
-                const auto shown = weak.lock();
-                if (shown && libraries)
-                    show(holder.get(), *shown, ((*libraries).*make)(shown));
-                else if (shown)
-                    shown->nativeFailed(PreviewModule::missingWords());
-            });
+            previews->whenLoaded(platform::weakly(view, [holder, make](View& shown, const auto& libraries) {
+                if (libraries)
+                    show(holder.get(), shown,
+                        ((*libraries).*make)(std::static_pointer_cast<View>(shown.shared_from_this())));
+                else
+                    shown.nativeFailed(PreviewModule::missingWords());
+            }));
         });
 }
 

@@ -8,6 +8,7 @@
 #include "host/gtk/views/TextFieldPeer.h"
 #include "kit/views/HostedView.h"
 #include "kit/views/TextField.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 
@@ -152,19 +153,15 @@ void AlertContent::addContentView(const Alert& alert)
     const auto content = alert.contentViewController();
     if (!content)
         return;
-    const std::weak_ptr<kit::View> weak = content->view();
     auto peer = makePeer(_context, content->view());
-    const auto resize = [weak](platform::Size size) {
-        if (const auto view = weak.lock())
-            view->setFrame({0, 0, size.width, size.height});
-    };
-    const auto fit = [weak](double forWidth) -> platform::Size {
-        const auto view = weak.lock();
-        if (!view)
-            return {};
-        const double width = forWidth > 0 ? forWidth : assumedWidth;
-        return {0, view->systemLayoutSizeFitting({width, 0}).height};
-    };
+    const auto resize = platform::weakly(content->view(), [](kit::View& view, platform::Size size) {
+        view.setFrame({0, 0, size.width, size.height});
+    });
+    const auto fit =
+        platform::weaklyOr(platform::Size(), content->view(), [](kit::View& view, double forWidth) {
+            const double width = forWidth > 0 ? forWidth : assumedWidth;
+            return platform::Size{0, view.systemLayoutSizeFitting({width, 0}).height};
+        });
     peer->setRoot(resize, fit);
     gtk_box_append(GTK_BOX(_body), peer->widget());
     _peers.push_back(std::move(peer));
@@ -179,12 +176,11 @@ GtkWidget* AlertContent::makeActionButton(const std::shared_ptr<kit::AlertAction
         gtk_widget_add_css_class(button, "destructive");
     if (standsOut(*action, alert))
         gtk_widget_add_css_class(button, "preferred");
-    const std::weak_ptr<kit::AlertAction> weak = action;
-    _connections.push_back(connectSignal<void()>(button, "clicked", [alertOfButton = _alert, weak] {
-        const auto pressed = weak.lock();
-        if (const auto asked = alertOfButton.lock(); asked && pressed)
-            asked->press(pressed);
-    }));
+    _connections.push_back(connectSignal<void()>(button, "clicked",
+        platform::weakly(_alert, [weak = std::weak_ptr(action)](kit::AlertController& asked) {
+            if (const auto pressed = weak.lock())
+                asked.press(pressed);
+        })));
     return button;
 }
 

@@ -7,12 +7,15 @@
 #include "host/gtk/base/ViewPeer.h"
 #include "host/gtk/views/ButtonPeer.h"
 #include "platform/Localization.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 #include <utility>
 
 namespace host::gtk {
 using platform::Size;
+using platform::weakly;
+using platform::weaklyOr;
 
 namespace {
 
@@ -58,18 +61,13 @@ std::shared_ptr<ViewPeer> makeEmbeddedPeer(
     const std::shared_ptr<PeerContext>& context, const std::shared_ptr<kit::View>& view, double minimumHeight)
 {
     auto peer = makePeer(context, view);
-    const std::weak_ptr<kit::View> weak = view;
-    const auto resize = [weak](Size size) {
-        if (const auto shown = weak.lock())
-            shown->setFrame({0, 0, size.width, size.height});
-    };
-    const auto fit = [weak, minimumHeight](double forWidth) -> Size {
-        const auto shown = weak.lock();
-        if (!shown)
-            return {};
-        const Size wanted = shown->intrinsicContentSize(std::max(0.0, forWidth));
-        return {wanted.width, std::max(wanted.height, minimumHeight)};
-    };
+    const auto resize = weakly(view, [](kit::View& shown, Size size) {
+        shown.setFrame({0, 0, size.width, size.height});
+    });
+    const auto fit = weaklyOr(Size(), view, [minimumHeight](kit::View& shown, double forWidth) {
+        const Size wanted = shown.intrinsicContentSize(std::max(0.0, forWidth));
+        return Size{wanted.width, std::max(wanted.height, minimumHeight)};
+    });
     peer->setRoot(resize, fit);
     return peer;
 }
@@ -116,10 +114,7 @@ void BarItemPeer::showButton()
 {
     _widget = ObjectRef<GtkWidget>::retain(makeTouchButton());
     gtk_widget_set_valign(widget(), GTK_ALIGN_CENTER);
-    _onClicked = connectSignal<void()>(widget(), "clicked", [weak = _item] {
-        if (const auto pressed = weak.lock())
-            pressed->press();
-    });
+    _onClicked = connectSignal<void()>(widget(), "clicked", weakly(_item, &kit::BarButtonItem::press));
 }
 
 void BarItemPeer::barButtonItemDidChange(kit::BarButtonItem&)

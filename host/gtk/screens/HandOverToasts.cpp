@@ -7,6 +7,7 @@
 #include "platform/Dispatch.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 #include "screens/DisplayName.h"
 
 #include <algorithm>
@@ -17,6 +18,7 @@ namespace host::gtk {
 using platform::ActivityOffer;
 using platform::services;
 using platform::UserActivity;
+using platform::weakly;
 
 namespace {
 
@@ -60,10 +62,7 @@ std::shared_ptr<HandOverToasts> HandOverToasts::make(
     const auto toasts =
         std::make_shared<HandOverToasts>(overlay, std::move(continueActivity), std::move(failed));
     toasts->_offers = services().notificationCenter().observe(
-        platform::Notification::ActivityOffersDidChange, [weak = std::weak_ptr(toasts)](const auto&) {
-            if (const auto self = weak.lock())
-                self->refresh();
-        });
+        platform::Notification::ActivityOffersDidChange, weakly(toasts, &HandOverToasts::refresh));
     toasts->refresh();
     return toasts;
 }
@@ -103,19 +102,17 @@ void HandOverToasts::show(const ActivityOffer& offer)
     adw_toast_set_button_label(_toast.get(), platform::localized("Continue").c_str());
     adw_toast_set_timeout(_toast.get(), 0);
     _connections.push_back(
-        connectSignal<void()>(_toast.get(), "button-clicked", [weak = weak_from_this(), offer] {
-            if (const auto self = weak.lock())
-                self->chosen(offer);
-        }));
-    _connections.push_back(connectSignal<void()>(_toast.get(), "dismissed", [weak = weak_from_this()] {
-        const auto self = weak.lock();
-        if (!self)
-            return;
-        self->_settled.insert(std::exchange(self->_shown, {}));
-        self->_toast = {};
-        self->refresh();
-    }));
+        connectSignal<void()>(_toast.get(), "button-clicked", weakly(this, &HandOverToasts::chosen, offer)));
+    _connections.push_back(
+        connectSignal<void()>(_toast.get(), "dismissed", weakly(this, &HandOverToasts::dismissed)));
     adw_toast_overlay_add_toast(_overlay.get(), _toast.get());
+}
+
+void HandOverToasts::dismissed()
+{
+    _settled.insert(std::exchange(_shown, {}));
+    _toast = {};
+    refresh();
 }
 
 void HandOverToasts::takeAway()
@@ -133,13 +130,12 @@ void HandOverToasts::chosen(const ActivityOffer& offer)
     services().cloudDocumentService().items().decodeBookmark(bookmarkOf(offer.activity),
         [weak = weak_from_this(), activity = offer.activity, main = services().dispatch().mainQueue()](
             const platform::Result<platform::Url>& document) {
-            main->async([weak, activity, error = document.error] {
-                const auto self = weak.lock();
-                if (self && error)
-                    self->_fail(activity, *error);
-                else if (self)
-                    self->_continue(activity);
-            });
+            main->async(weakly(weak, [activity, error = document.error](HandOverToasts& self) {
+                if (error)
+                    self._fail(activity, *error);
+                else
+                    self._continue(activity);
+            }));
         });
 }
 

@@ -40,6 +40,7 @@ public:
 private:
     void refresh();
     void show(const platform::ActivityOffer& offer);
+    void dismissed();
     void takeAway();
     void chosen(const platform::ActivityOffer& offer);
 

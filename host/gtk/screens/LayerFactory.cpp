@@ -11,6 +11,7 @@
 #include "host/gtk/screens/SearchContent.h"
 #include "kit/controllers/NavigationController.h"
 #include "kit/controllers/ViewControllerVisitor.h"
+#include "platform/Weakly.h"
 
 #include <cmath>
 #include <optional>
@@ -137,10 +138,7 @@ private:
     }
     static std::function<void()> cancel(kit::ViewController& screen)
     {
-        return [weak = screen.weak_from_this()] {
-            if (const auto left = weak.lock())
-                left->userCancelled();
-        };
+        return platform::weakly(&screen, &kit::ViewController::userCancelled);
     }
     void makeScreen(kit::ViewController& screen)
     {

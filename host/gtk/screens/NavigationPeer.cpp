@@ -5,6 +5,7 @@
 
 #include "host/gtk/base/ViewPeer.h"
 #include "kit/controllers/NavigationController.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 
@@ -26,10 +27,10 @@ NavigationPeer::NavigationPeer(std::shared_ptr<PeerContext> context,
     : _context(std::move(context))
     , _navigation(navigation)
     , _buttons(buttons)
-    , _bin([weak = std::weak_ptr(navigation)](platform::Size size) {
-        if (const auto stack = weak.lock())
-            stack->view()->setFrame({0, 0, size.width, size.height});
-    })
+    , _bin(platform::weakly(navigation,
+          [](kit::NavigationController& stack, platform::Size size) {
+              stack.view()->setFrame({0, 0, size.width, size.height});
+          }))
     , _leaflet(ObjectRef<GtkWidget>::retain(adw_leaflet_new()))
 {
     adw_leaflet_set_can_unfold(leaflet(), FALSE);

@@ -7,6 +7,7 @@
 #include "kit/controllers/NavigationController.h"
 #include "kit/controllers/NavigationItem.h"
 #include "kit/values/TraitCollection.h"
+#include "platform/Weakly.h"
 
 namespace host::gtk {
 
@@ -34,10 +35,8 @@ ScreenPage::ScreenPage(std::shared_ptr<PeerContext> context,
     gtk_box_append(GTK_BOX(widget()), _toolbar.widget());
     gtk_widget_add_css_class(widget(), "background");
     _navigationBar.setWindowButtons(buttons == WindowButtons::Shown);
-    _navigationBar.setOnBack([weak = _navigation] {
-        if (const auto stack = weak.lock())
-            stack->userWentBack();
-    });
+    _navigationBar.setOnBack(
+        platform::weakly(_navigation, [](kit::NavigationController& stack) { stack.userWentBack(); }));
     // A screen below the top one is loaded when a swipe uncovers it.
     _onMap = connectSignal<void()>(widget(), "map", [this] { load(); });
     if (screen->isViewLoaded())

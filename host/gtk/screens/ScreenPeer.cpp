@@ -9,6 +9,7 @@
 #include "kit/controllers/NavigationController.h"
 #include "kit/controllers/SearchPresentation.h"
 #include "kit/controllers/ViewControllerVisitor.h"
+#include "platform/Weakly.h"
 
 namespace host::gtk {
 
@@ -20,11 +21,9 @@ public:
     PlainScreenPeer(const std::shared_ptr<PeerContext>& context, kit::ViewController& screen)
         : _peer(makePeer(context, screen.view()))
     {
-        const std::weak_ptr<kit::View> weak = screen.view();
-        _peer->setRoot([weak](platform::Size size) {
-            if (const auto view = weak.lock())
-                view->setFrame({0, 0, size.width, size.height});
-        });
+        _peer->setRoot(platform::weakly(screen.view(), [](kit::View& view, platform::Size size) {
+            view.setFrame({0, 0, size.width, size.height});
+        }));
         gtk_widget_set_hexpand(widget(), TRUE);
         gtk_widget_set_vexpand(widget(), TRUE);
     }

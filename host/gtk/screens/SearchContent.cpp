@@ -4,6 +4,7 @@
 #include "host/gtk/screens/SearchContent.h"
 
 #include "platform/Localization.h"
+#include "platform/Weakly.h"
 
 namespace host::gtk {
 
@@ -62,18 +63,13 @@ void SearchContent::buildBar(const kit::SearchPresentation& search)
     gtk_box_append(GTK_BOX(bar), _entry);
     gtk_box_append(GTK_BOX(bar), _cancel);
     gtk_box_append(GTK_BOX(widget()), bar);
-    const auto cancel = [weak = _search] {
-        if (const auto left = weak.lock())
-            left->userCancelled();
-    };
+    const auto cancel = platform::weakly(_search, &kit::SearchPresentation::userCancelled);
     _onEdited = connectSignal<void()>(_entry, "changed", [this] {
         if (const auto edited = _search.lock())
             edited->userEditedQuery(gtk_editable_get_text(GTK_EDITABLE(_entry)));
     });
-    _connections.push_back(connectSignal<void()>(_entry, "activate", [weak = _search] {
-        if (const auto pressed = weak.lock())
-            pressed->userPressedReturn();
-    }));
+    _connections.push_back(connectSignal<void()>(
+        _entry, "activate", platform::weakly(_search, &kit::SearchPresentation::userPressedReturn)));
     connectKeys();
     _connections.push_back(connectSignal<void()>(_entry, "stop-search", cancel));
     _connections.push_back(connectSignal<void()>(_cancel, "clicked", cancel));
@@ -85,14 +81,13 @@ void SearchContent::connectKeys()
     auto* keys = gtk_event_controller_key_new();
     gtk_event_controller_set_propagation_phase(keys, GTK_PHASE_CAPTURE);
     gtk_widget_add_controller(_entry, keys);
-    _connections.push_back(connectSignal<gboolean(guint, guint, GdkModifierType)>(
-        keys, "key-pressed", [weak = _search](guint key, guint, GdkModifierType) -> gboolean {
-            const auto search = weak.lock();
+    _connections.push_back(connectSignal<gboolean(guint, guint, GdkModifierType)>(keys, "key-pressed",
+        platform::weaklyOr(FALSE, _search, [](kit::SearchPresentation& search, guint key, auto...) {
             const bool isDown = key == GDK_KEY_Down || key == GDK_KEY_KP_Down;
-            if (search && isDown)
-                search->userWentDown();
-            return search && isDown;
-        }));
+            if (isDown)
+                search.userWentDown();
+            return isDown;
+        })));
 }
 
 void SearchContent::focus()

@@ -8,6 +8,7 @@
 #include "host/gtk/screens/LayerFactory.h"
 #include "kit/controllers/ViewController.h"
 #include "platform/Localization.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 
@@ -242,9 +243,10 @@ void WindowPeer::windowWillDismiss(
     const bool moves =
         presentation.animated && _theme->animationsEnabled() && gtk_widget_get_mapped(_overlay);
     _leaving.push_back(gone.layer);
-    gone.layer->hide(moves, [weak = weak_from_this(), layer = std::weak_ptr(gone.layer), token] {
-        if (const auto self = weak.lock())
-            self->layerHasGone(layer.lock());
+    const auto hasGone = platform::weakly(
+        this, [layer = std::weak_ptr(gone.layer)](WindowPeer& self) { self.layerHasGone(layer.lock()); });
+    gone.layer->hide(moves, [hasGone, token] {
+        hasGone();
         token.finish();
     });
 }

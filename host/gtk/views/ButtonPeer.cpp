@@ -6,6 +6,7 @@
 #include "host/gtk/base/ImagePaint.h"
 #include "host/gtk/views/LabelPeer.h"
 #include "kit/views/Button.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 
@@ -82,10 +83,7 @@ ButtonPeer::ButtonPeer(std::shared_ptr<PeerContext> context, const std::shared_p
     gtk_button_set_child(GTK_BUTTON(made), content);
     gtk_widget_add_css_class(made, "kit-button");
     setNative(made);
-    connect(connectSignal<void()>(made, "clicked", [weak = _button] {
-        if (const auto pressed = weak.lock())
-            pressed->press();
-    }));
+    connect(connectSignal<void()>(made, "clicked", platform::weakly(_button, &kit::Button::press)));
 }
 
 void ButtonPeer::mirror(kit::View& shown, kit::ViewChanges changes)

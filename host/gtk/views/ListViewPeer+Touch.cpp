@@ -7,11 +7,13 @@
 #include "host/gtk/views/ListViewPeer.h"
 #include "platform/Dispatch.h"
 #include "platform/Services.h"
+#include "platform/Weakly.h"
 
 #include <cmath>
 
 namespace host::gtk {
 using platform::Point;
+using platform::weakly;
 
 namespace {
 
@@ -111,12 +113,11 @@ void ListViewPeer::held(GtkWidget* row, double x, double y)
 void ListViewPeer::waitForPressOn()
 {
     auto& dispatch = platform::services().dispatch();
-    dispatch.after(pressOn, dispatch.mainQueue(), [weak = weak_from_this(), hold = ++_holds] {
-        const auto self = std::static_pointer_cast<ListViewPeer>(weak.lock());
-        const auto held = self ? self->_list.lock() : nullptr;
-        if (held && self->_holds == hold)
+    dispatch.after(pressOn, dispatch.mainQueue(), weakly(this, [hold = ++_holds](ListViewPeer& self) {
+        const auto held = self._list.lock();
+        if (held && self._holds == hold)
             held->pressOnHeldRow();
-    });
+    }));
 }
 
 } // namespace host::gtk

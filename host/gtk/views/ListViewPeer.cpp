@@ -6,12 +6,14 @@
 #include "host/gtk/base/MenuPopover.h"
 #include "host/gtk/views/ListRowWidget.h"
 #include "host/gtk/views/RowModel.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 #include <cmath>
 
 namespace host::gtk {
 using platform::Point;
+using platform::weakly;
 
 namespace {
 
@@ -177,42 +179,33 @@ void ListViewPeer::connectInput()
 
 void ListViewPeer::setUpRow(GtkListItem* item)
 {
-    const std::weak_ptr<ListViewPeer> peer = std::static_pointer_cast<ListViewPeer>(shared_from_this());
     using Request = ListRowWidget::Request;
-    auto* row = ListRowWidget::make(item, [peer](GtkWidget* asked, Request request) {
-        const double x = gtk_widget_get_width(asked) / 2.0, y = gtk_widget_get_height(asked) / 2.0;
-        const auto self = peer.lock();
-        if (self && request == Request::Peek)
-            self->held(asked, x, y);
-        else if (self)
-            self->showMenuOf(asked, x, y);
-    });
-    const auto answer = [peer, row](void (ListViewPeer::*show)(GtkWidget*, double, double)) {
-        return [peer, row, show](GtkGesture* gesture, double x, double y) {
-            const auto self = peer.lock();
-            if (!self)
-                return;
-            gtk_gesture_set_state(gesture, GTK_EVENT_SEQUENCE_CLAIMED);
-            (*self.*show)(row, x, y);
-        };
-    };
+    auto* row =
+        ListRowWidget::make(item, weakly(this, [](ListViewPeer& self, GtkWidget* asked, Request request) {
+            const double x = gtk_widget_get_width(asked) / 2.0, y = gtk_widget_get_height(asked) / 2.0;
+            if (request == Request::Peek)
+                self.held(asked, x, y);
+            else
+                self.showMenuOf(asked, x, y);
+        }));
     auto* press = gtk_gesture_long_press_new();
     gtk_widget_add_controller(row, GTK_EVENT_CONTROLLER(press));
     connectForLife<void(double, double)>(
-        press, "pressed", [peer, hold = answer(&ListViewPeer::held), press](double x, double y) {
-            hold(press, x, y);
-            if (const auto self = peer.lock())
-                self->waitForPressOn();
-        });
-    connectForLife<void(GdkEventSequence*)>(press, "end", [peer](GdkEventSequence*) {
-        if (const auto self = peer.lock())
-            ++self->_holds;
-    });
+        press, "pressed", weakly(this, [row, press](ListViewPeer& self, double x, double y) {
+            gtk_gesture_set_state(press, GTK_EVENT_SEQUENCE_CLAIMED);
+            self.held(row, x, y);
+            self.waitForPressOn();
+        }));
+    connectForLife<void(GdkEventSequence*)>(
+        press, "end", weakly(this, [](ListViewPeer& self) { ++self._holds; }));
     auto* click = gtk_gesture_click_new();
     gtk_gesture_single_set_button(GTK_GESTURE_SINGLE(click), GDK_BUTTON_SECONDARY);
     gtk_widget_add_controller(row, GTK_EVENT_CONTROLLER(click));
-    connectForLife<void(int, double, double)>(click, "pressed",
-        [menu = answer(&ListViewPeer::showMenuOf), click](int, double x, double y) { menu(click, x, y); });
+    connectForLife<void(int, double, double)>(
+        click, "pressed", weakly(this, [row, click](ListViewPeer& self, int, double x, double y) {
+            gtk_gesture_set_state(click, GTK_EVENT_SEQUENCE_CLAIMED);
+            self.showMenuOf(row, x, y);
+        }));
     gtk_list_item_set_child(item, row);
 }
 

@@ -5,6 +5,7 @@
 
 #include "host/gtk/base/TextLayout.h"
 #include "kit/views/TextField.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 
@@ -56,14 +57,8 @@ void TextFieldPeer::connectEvents()
         [entry](GtkEntryIconPosition) { gtk_editable_set_text(GTK_EDITABLE(entry), ""); }));
     auto* focus = gtk_event_controller_focus_new();
     gtk_widget_add_controller(entry, focus);
-    connect(connectSignal<void()>(focus, "enter", [weak = _field] {
-        if (const auto field = weak.lock())
-            field->userFocused();
-    }));
-    connect(connectSignal<void()>(focus, "leave", [weak = _field] {
-        if (const auto field = weak.lock())
-            field->userLeft();
-    }));
+    connect(connectSignal<void()>(focus, "enter", platform::weakly(_field, &kit::TextField::userFocused)));
+    connect(connectSignal<void()>(focus, "leave", platform::weakly(_field, &kit::TextField::userLeft)));
 }
 
 void TextFieldPeer::edited()
