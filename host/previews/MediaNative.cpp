@@ -5,6 +5,7 @@
 
 #include "host/previews/MediaSupport.h"
 #include "platform/Localization.h"
+#include "platform/Weakly.h"
 
 #include <utility>
 
@@ -58,16 +59,16 @@ void MediaNative::start()
 void MediaNative::previewContentDidChange()
 {
     close();
-    MediaSupport::check([weak = weak_from_this(), generation = ++_generation](const std::string& missing) {
-        const auto self = std::static_pointer_cast<MediaNative>(weak.lock());
-        const auto view = self && self->_generation == generation ? self->_view.lock() : nullptr;
-        if (!view)
-            return;
-        if (missing.empty())
-            self->open();
-        else
-            view->nativeFailed(missing);
-    });
+    MediaSupport::check(
+        platform::weakly(this, [generation = ++_generation](MediaNative& self, const std::string& missing) {
+            const auto view = self._generation == generation ? self._view.lock() : nullptr;
+            if (!view)
+                return;
+            if (missing.empty())
+                self.open();
+            else
+                view->nativeFailed(missing);
+        }));
 }
 
 void MediaNative::open()

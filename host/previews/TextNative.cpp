@@ -4,6 +4,7 @@
 #include "host/previews/TextNative.h"
 
 #include "host/previews/SourceLanguages.h"
+#include "platform/Weakly.h"
 
 #include <adwaita.h>
 
@@ -174,14 +175,14 @@ void TextNative::previewContentDidChange()
 
 void TextNative::findLanguage()
 {
-    SourceLanguages::guess(_fileName, [weak = weak_from_this(), name = _fileName](const auto& language) {
-        const auto self = std::static_pointer_cast<TextNative>(weak.lock());
-        if (!self || self->_fileName != name)
-            return;
-        self->_language = language;
-        if (self->_inserting == 0)
-            self->finishText();
-    });
+    SourceLanguages::guess(
+        _fileName, platform::weakly(this, [name = _fileName](TextNative& self, const auto& language) {
+            if (self._fileName != name)
+                return;
+            self._language = language;
+            if (self._inserting == 0)
+                self.finishText();
+        }));
 }
 
 void TextNative::replaceText(const std::string& text)

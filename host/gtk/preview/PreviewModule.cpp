@@ -70,10 +70,12 @@ void PreviewModule::loadOnWorker()
 {
     auto& dispatch = platform::services().dispatch();
     _queue = dispatch.makeSerialQueue("preview libraries");
-    _queue->async([weak = weak_from_this(), main = dispatch.mainQueue()] {
-        platform::weakly(weak, &PreviewModule::load)();
-        main->async(platform::weakly(weak, &PreviewModule::answerAll));
-    });
+    _queue->async(
+        [loading = platform::weakly(this, &PreviewModule::load),
+            answering = platform::weakly(this, &PreviewModule::answerAll), main = dispatch.mainQueue()] {
+            loading();
+            main->async(answering);
+        });
 }
 
 void PreviewModule::answerAll()
