@@ -5,6 +5,7 @@
 
 #include "host/system/coordination/PresenterNotices.h"
 #include "host/system/files/ItemPaths.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 
@@ -13,6 +14,7 @@ namespace host::system {
 namespace {
 
 using platform::Duration;
+using platform::weakly;
 
 // A program that saves makes several changes at once. What is missing may be on its way back: a save that
 // puts the old version aside first takes as long as writing the new one does.
@@ -52,17 +54,9 @@ void PresenterWatch::stop()
     _watches.reset();
 }
 
-platform::Work PresenterWatch::later(void (PresenterWatch::*step)())
-{
-    return [weak = weak_from_this(), step] {
-        if (const auto self = weak.lock())
-            (self.get()->*step)();
-    };
-}
-
 void PresenterWatch::presentersChanged()
 {
-    _queue->async(later(&PresenterWatch::askAgain));
+    _queue->async(weakly(this, &PresenterWatch::askAgain));
 }
 
 void PresenterWatch::askAgain()
@@ -92,11 +86,10 @@ std::vector<PresenterWatch::Asked> PresenterWatch::askPresenters() const
 
 std::unique_ptr<FolderWatches> PresenterWatch::makeWatches()
 {
-    const auto arrived = [weak = weak_from_this()] {
-        const auto self = weak.lock();
-        if (self && !self->_isReading.exchange(true))
-            self->_queue->async(self->later(&PresenterWatch::readEvents));
-    };
+    const auto arrived = weakly(this, [](PresenterWatch& self) {
+        if (!self._isReading.exchange(true))
+            self._queue->async(weakly(&self, &PresenterWatch::readEvents));
+    });
     return std::make_unique<FolderWatches>(std::make_unique<Inotify>(Inotify::Writing::AtOnce, arrived));
 }
 
@@ -162,10 +155,10 @@ void PresenterWatch::lookLater(Duration delay)
     const bool isNeeded =
         std::ranges::any_of(_presenters, [this](const auto& each) { return mustLook(each); });
     if (isNeeded && !std::exchange(_isLookComing, true))
-        _dispatch->after(delay, _queue, later(&PresenterWatch::look));
+        _dispatch->after(delay, _queue, weakly(this, &PresenterWatch::look));
     const bool isBlind = std::ranges::any_of(_presenters, &WatchedPresenter::isBlind);
     if (isBlind && !std::exchange(_isPollComing, true))
-        _dispatch->after(pollPeriod, _queue, later(&PresenterWatch::poll));
+        _dispatch->after(pollPeriod, _queue, weakly(this, &PresenterWatch::poll));
 }
 
 void PresenterWatch::look()

@@ -58,7 +58,6 @@ private:
     };
     std::vector<Asked> askPresenters() const;
     std::unique_ptr<FolderWatches> makeWatches();
-    platform::Work later(void (PresenterWatch::*step)());
 
     // Steps on the queue.
     void askAgain();

@@ -3,6 +3,8 @@
 
 #include "host/system/listing/FolderWatcher.h"
 
+#include "platform/Weakly.h"
+
 #include <sys/inotify.h>
 
 #include <mutex>
@@ -42,10 +44,7 @@ FolderWatcher::FolderWatcher(Handler changed, Handler written)
     const auto writing = written ? Inotify::Writing::AtOnce : Inotify::Writing::WhenClosed;
     _state->changed = std::move(changed);
     _state->written = std::move(written);
-    _state->inotify = std::make_unique<Inotify>(writing, [weak = std::weak_ptr(_state)] {
-        if (const auto state = weak.lock())
-            state->tell();
-    });
+    _state->inotify = std::make_unique<Inotify>(writing, platform::weakly(_state, &State::tell));
 }
 
 bool FolderWatcher::watch(const std::string& folder)

@@ -4,6 +4,7 @@
 #include "host/system/listing/WatchedListing.h"
 
 #include "host/system/listing/FolderRevising.h"
+#include "platform/Weakly.h"
 
 #include <sys/stat.h>
 
@@ -16,6 +17,7 @@ namespace host::system {
 using platform::Duration;
 using platform::FolderSnapshot;
 using platform::ListingStage;
+using platform::weakly;
 
 namespace {
 
@@ -107,16 +109,18 @@ void WatchedListing::work()
 void WatchedListing::restFor(Duration pause)
 {
     _isResting = true;
-    _dispatch->after(pause, _dispatch->mainQueue(), [weak = weak_from_this(), rest = ++_rest] {
-        const auto self = weak.lock();
-        if (!self || self->_rest != rest)
-            return;
-        self->_isResting = false;
-        if (std::exchange(self->_mustSettle, false))
-            self->restFor(lossSettles);
-        else
-            self->work();
-    });
+    _dispatch->after(pause, _dispatch->mainQueue(), weakly(this, &WatchedListing::restEnded, ++_rest));
+}
+
+void WatchedListing::restEnded(std::uint64_t rest)
+{
+    if (_rest != rest)
+        return;
+    _isResting = false;
+    if (std::exchange(_mustSettle, false))
+        restFor(lossSettles);
+    else
+        work();
 }
 
 void WatchedListing::workEnded()
@@ -147,14 +151,8 @@ void WatchedListing::watch()
 {
     if (_watcher)
         return;
-    const auto telling = [this](void (WatchedListing::*tell)(const Names&)) {
-        return [weak = weak_from_this(), tell](const Names& names) {
-            if (const auto self = weak.lock())
-                (*self.*tell)(names);
-        };
-    };
     _watcher = std::make_shared<FolderWatcher>(
-        telling(&WatchedListing::folderChanged), telling(&WatchedListing::filesWritten));
+        weakly(this, &WatchedListing::folderChanged), weakly(this, &WatchedListing::filesWritten));
 }
 
 void WatchedListing::filesWritten(const Names& names)
@@ -163,12 +161,10 @@ void WatchedListing::filesWritten(const Names& names)
     std::ranges::copy_if(names, std::inserter(_written, _written.end()), mayBeListed);
     if (isWaiting || _written.empty())
         return;
-    _dispatch->after(betweenLooksAtWriting, _dispatch->mainQueue(), [weak = weak_from_this()] {
-        if (const auto self = weak.lock()) {
-            const auto written = std::exchange(self->_written, {});
-            self->folderChanged({written.begin(), written.end()});
-        }
-    });
+    _dispatch->after(betweenLooksAtWriting, _dispatch->mainQueue(), weakly(this, [](WatchedListing& self) {
+        const auto written = std::exchange(self._written, {});
+        self.folderChanged({written.begin(), written.end()});
+    }));
 }
 
 bool WatchedListing::isTooMuch() const
@@ -181,13 +177,11 @@ void WatchedListing::startReading()
     _mustRead = false;
     _names.clear();
     watch();
-    const auto put = [inbox = _inbox, queue = _dispatch->mainQueue(), weak = weak_from_this()](
+    const auto put = [inbox = _inbox, queue = _dispatch->mainQueue(),
+                         deliver = weakly(this, &WatchedListing::deliver)](
                          std::shared_ptr<const FolderSnapshot> snapshot) {
         if (inbox->put(std::move(snapshot)))
-            queue->async([weak] {
-                if (const auto self = weak.lock())
-                    self->deliver();
-            });
+            queue->async(deliver);
     };
     // The watch begins before the reading, so that no change falls between them.
     const auto opened = [watcher = _watcher, inbox = _inbox](const FileDescriptor& folder) {
@@ -232,10 +226,7 @@ void WatchedListing::startRevising()
         const auto folder = openFolder(subject.folder.path());
         const bool isSame = folder && inbox->folder() == identityOf(folder);
         auto after = isSame ? revisedList(*tools, subject.grouping, folder, before, names) : nullptr;
-        queue->async([weak, before, after = std::move(after)] {
-            if (const auto self = weak.lock())
-                self->revisingEnded(before, after);
-        });
+        queue->async(weakly(weak, &WatchedListing::revisingEnded, before, std::move(after)));
     });
 }
 

@@ -41,6 +41,7 @@ private:
     void folderChanged(const Names& names);
     void filesWritten(const Names& names);
     void restFor(platform::Duration pause);
+    void restEnded(std::uint64_t rest);
     void work();
     void startReading();
     void deliver();

@@ -6,6 +6,7 @@
 #include "host/system/queues/PoolQueues.h"
 #include "host/system/queues/Scheduler.h"
 #include "host/system/queues/WorkerPool.h"
+#include "platform/Weakly.h"
 
 #include <glib.h>
 
@@ -18,6 +19,7 @@ namespace host::system {
 using platform::Duration;
 using platform::QualityOfService;
 using platform::Queue;
+using platform::weakly;
 using platform::Work;
 
 namespace {
@@ -59,10 +61,7 @@ private:
         // After the machine slept or the thread was held up, missed calls are left out.
         _due = std::max(_due, Scheduler::Clock::now());
         if (const auto scheduler = _scheduler.lock())
-            scheduler->schedule(_due, _leeway, [weak = weak_from_this()] {
-                if (const auto self = weak.lock())
-                    self->fire();
-            });
+            scheduler->schedule(_due, _leeway, weakly(this, &TimerState::fire));
     }
 
     void fire()

@@ -4,6 +4,7 @@
 #include "host/system/search/IndexedNameSearch.h"
 
 #include "host/system/search/NameGathering.h"
+#include "platform/Weakly.h"
 
 #include <atomic>
 #include <chrono>
@@ -14,6 +15,7 @@ namespace host::system {
 
 using platform::NameSearchResults;
 using platform::Url;
+using platform::weakly;
 
 namespace {
 
@@ -59,10 +61,10 @@ public:
     void sessionEnded()
     {
         --_sessions;
-        dispatch->after(keptUnused, reading, [weak = weak_from_this(), number = ++_ended] {
-            if (const auto store = weak.lock(); store && store->_sessions == 0 && store->_ended == number)
-                store->keep({}, nullptr);
-        });
+        dispatch->after(keptUnused, reading, weakly(this, [number = ++_ended](Store& self) {
+            if (self._sessions == 0 && self._ended == number)
+                self.keep({}, nullptr);
+        }));
     }
 
     const std::shared_ptr<platform::Dispatch> dispatch;
@@ -128,11 +130,9 @@ private:
     {
         NameGathering gathering(store.classifier, store.folding, earlier,
             {.isCancelled = [&weak] { return weak.expired(); },
-                .progress =
-                    [&weak](const NameIndex& soFar) {
-                        if (const auto session = weak.lock())
-                            session->adopt(std::make_shared<const NameIndex>(soFar), false);
-                    }});
+                .progress = weakly(weak, [](Session& self, const NameIndex& soFar) {
+                    self.adopt(std::make_shared<const NameIndex>(soFar), false);
+                })});
         auto gathered = gathering.gather(roots);
         const auto session = weak.lock();
         if (!session)
@@ -141,10 +141,7 @@ private:
             session->adopt(std::make_shared<const NameIndex>(std::move(gathered)), true);
         else
             session->completed();
-        store.dispatch->after(refreshInterval, store.reading, [weak] {
-            if (const auto again = weak.lock())
-                again->refreshSoon();
-        });
+        store.dispatch->after(refreshInterval, store.reading, weakly(weak, &Session::refreshSoon));
     }
 
     void adopt(Index index, bool isComplete)
@@ -173,10 +170,7 @@ private:
     {
         if (_findIsWaiting.exchange(true))
             return;
-        _store->finding->async([weak = weak_from_this()] {
-            if (const auto session = weak.lock())
-                session->find();
-        });
+        _store->finding->async(weakly(this, &Session::find));
     }
 
     void find()
@@ -201,10 +195,10 @@ private:
         for (const auto number : found.items)
             results.items.push_back(index->found(number));
         _store->dispatch->mainQueue()->async(
-            [weak = weak_from_this(), generation, results = std::move(results)] {
-                if (const auto session = weak.lock(); session && session->_generation == generation)
-                    session->_update(results);
-            });
+            weakly(this, [generation, results = std::move(results)](Session& self) {
+                if (self._generation == generation)
+                    self._update(results);
+            }));
     }
 
     const std::shared_ptr<Store> _store;
