@@ -7,6 +7,7 @@
 #include "host/drive/records/AccountRecord.h"
 #include "host/drive/records/LinkRecords.h"
 #include "host/drive/records/PromiseRecord.h"
+#include "platform/Weakly.h"
 
 #include <cerrno>
 
@@ -15,6 +16,7 @@ namespace host::drive {
 using platform::Error;
 using platform::Result;
 using platform::Url;
+using platform::weakly;
 using Kind = DocumentIndex::Answer::Kind;
 
 namespace {
@@ -161,15 +163,15 @@ void LocalDocumentIdentifiers::searchInBackground(const IdentifiedPlace& known)
         if (!_searched.insert(known.identifier).second)
             return;
     }
-    _queue->async([weak = weak_from_this(), known] {
-        const auto self = weak.lock();
-        if (!self)
-            return;
-        if (self->_index.state() != DocumentIndex::State::Complete)
-            self->rebuild();
-        else if (const auto place = self->locate(known, Effort::Whole))
-            self->_index.note(known.identifier, *place);
-    });
+    _queue->async(weakly(this, &LocalDocumentIdentifiers::searchFor, known));
+}
+
+void LocalDocumentIdentifiers::searchFor(const IdentifiedPlace& known)
+{
+    if (_index.state() != DocumentIndex::State::Complete)
+        rebuild();
+    else if (const auto place = locate(known, Effort::Whole))
+        _index.note(known.identifier, *place);
 }
 
 void LocalDocumentIdentifiers::rebuild()
@@ -205,10 +207,7 @@ void LocalDocumentIdentifiers::seen(std::uint32_t identifier, const std::string&
         known = path;
         _searched.erase(identifier);
     }
-    _queue->async([weak = weak_from_this(), identifier, path] {
-        if (const auto self = weak.lock())
-            self->correct(identifier, path);
-    });
+    _queue->async(weakly(this, &LocalDocumentIdentifiers::correct, identifier, path));
 }
 
 void LocalDocumentIdentifiers::correct(std::uint32_t identifier, const std::string& path)
@@ -245,10 +244,7 @@ void LocalDocumentIdentifiers::moved(const std::string& from, const std::string&
 
 void LocalDocumentIdentifiers::replaced(const std::string& path)
 {
-    _queue->async([weak = weak_from_this(), path] {
-        if (const auto self = weak.lock())
-            self->moved(path, path);
-    });
+    _queue->async(weakly(this, &LocalDocumentIdentifiers::moved, path, path));
 }
 
 std::vector<std::uint32_t> LocalDocumentIdentifiers::documentsWithin(const std::string& path) const

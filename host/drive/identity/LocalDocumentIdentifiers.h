@@ -59,6 +59,7 @@ private:
     platform::Result<File> resolve(std::uint32_t identifier, Effort effort);
     std::optional<DocumentPlace> locate(const IdentifiedPlace& known, Effort effort);
     void searchInBackground(const IdentifiedPlace& known);
+    void searchFor(const IdentifiedPlace& known);
     void rebuild();
     void correct(std::uint32_t identifier, const std::string& path);
     platform::Result<std::uint32_t> giveIdentifier(const IdentifiedItem& item);

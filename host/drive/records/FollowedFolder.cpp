@@ -3,6 +3,8 @@
 
 #include "host/drive/records/FollowedFolder.h"
 
+#include "platform/Weakly.h"
+
 #include <sys/stat.h>
 
 #include <algorithm>
@@ -39,10 +41,8 @@ void FollowedFolder::watch()
 {
     if (_ifMissing == IfMissing::Make)
         ::mkdir(_path.c_str(), 0700); // the watch tells when this failed
-    _watcher = std::make_unique<host::system::FolderWatcher>([weak = weak_from_this()](const auto& names) {
-        if (const auto self = weak.lock())
-            self->namesChanged(names);
-    });
+    _watcher =
+        std::make_unique<host::system::FolderWatcher>(platform::weakly(this, &FollowedFolder::namesChanged));
     _isWatched = _watcher->watch(_path);
     if (!_isWatched)
         watchLater();
@@ -50,14 +50,11 @@ void FollowedFolder::watch()
 
 void FollowedFolder::watchLater()
 {
-    _dispatch->after(retryDelay, _dispatch->mainQueue(), [weak = weak_from_this()] {
-        const auto self = weak.lock();
-        if (!self)
-            return;
-        self->watch();
-        if (self->_isWatched)
-            self->_changed({std::string()});
-    });
+    _dispatch->after(retryDelay, _dispatch->mainQueue(), platform::weakly(this, [](FollowedFolder& self) {
+        self.watch();
+        if (self._isWatched)
+            self._changed({std::string()});
+    }));
 }
 
 void FollowedFolder::namesChanged(const std::vector<std::string>& names)

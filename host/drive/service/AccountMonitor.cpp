@@ -5,6 +5,7 @@
 
 #include "host/drive/records/AccountRecord.h"
 #include "platform/Log.h"
+#include "platform/Weakly.h"
 
 #include <utility>
 
@@ -41,11 +42,10 @@ void AccountMonitor::begin()
     static constexpr platform::Operation op{"-[AccountMonitor begin]"};
     // The folder is watched rather than the file, so that its creation and its replacement are seen.
     _folder = FollowedFolder::follow(_dispatch, _layout.home(), FollowedFolder::IfMissing::Wait,
-        [weak = weak_from_this()](const auto& names) {
-            const auto self = weak.lock();
-            if (self && mayHaveChanged(names, DriveLayout::accountFileName))
-                self->check();
-        });
+        platform::weakly(this, [](AccountMonitor& self, const std::vector<std::string>& names) {
+            if (mayHaveChanged(names, DriveLayout::accountFileName))
+                self.check();
+        }));
     if (!_folder->isWatched())
         op.warning("Cannot watch the account's folder %@", _layout.home());
     // Read after the watch began, so that no change falls between the two.
@@ -60,10 +60,7 @@ void AccountMonitor::check()
         return;
     }
     _queue->async([weak = weak_from_this(), layout = _layout, main = _dispatch->mainQueue()] {
-        main->async([weak, identity = currentIdentity(layout)] {
-            if (const auto self = weak.lock())
-                self->identityRead(identity);
-        });
+        main->async(platform::weakly(weak, &AccountMonitor::identityRead, currentIdentity(layout)));
     });
 }
 

@@ -8,6 +8,7 @@
 #include "host/drive/records/DeviceIdentity.h"
 #include "host/system/files/AtomicWrite.h"
 #include "platform/Log.h"
+#include "platform/Weakly.h"
 
 #include <sys/stat.h>
 #include <unistd.h>
@@ -50,10 +51,7 @@ void ActivityPublication::resignCurrent(const Activity& activity)
 void ActivityPublication::set(const Activity& activity)
 {
     _current = activity;
-    const auto update = [weak = weak_from_this()] {
-        if (const auto self = weak.lock())
-            self->bringUpToDate();
-    };
+    const auto update = platform::weakly(this, &ActivityPublication::bringUpToDate);
     // The timer calls at once, too.
     if (activity && activity->isEligibleForHandOff) {
         _renewal = _dispatch->startTimer(_queue, renewal, renewalLeeway, update);

@@ -8,6 +8,7 @@
 #include "host/drive/records/SmallFile.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Log.h"
+#include "platform/Weakly.h"
 
 #include <algorithm>
 #include <filesystem>
@@ -19,6 +20,7 @@ namespace {
 
 using platform::ActivityOffer;
 using platform::Date;
+using platform::weakly;
 
 /// The clocks of two devices differ: a time ahead of ours is as good as one behind.
 bool isRecent(Date time, Date now)
@@ -108,15 +110,9 @@ LocalActivityHandOver::LocalActivityHandOver(const DriveLayout& layout, const Dr
 void LocalActivityHandOver::begin()
 {
     _identity = _notifications->observe(
-        platform::Notification::CloudIdentityDidChange, [weak = weak_from_this()](const auto&) {
-            if (const auto self = weak.lock())
-                self->readAgain();
-        });
+        platform::Notification::CloudIdentityDidChange, weakly(this, &LocalActivityHandOver::readAgain));
     _folder = FollowedFolder::follow(_dispatch, _layout.activities(), FollowedFolder::IfMissing::Make,
-        [weak = weak_from_this()](const auto&) {
-            if (const auto self = weak.lock())
-                self->readAgain();
-        });
+        weakly(this, &LocalActivityHandOver::readAgain));
     if (_folder->isWatched())
         readAgain();
 }
@@ -129,10 +125,7 @@ void LocalActivityHandOver::readAgain()
     }
     _queue->async(
         [weak = weak_from_this(), layout = _layout, now = _dispatch->now(), main = _dispatch->mainQueue()] {
-            main->async([weak, records = readRecords(layout, now)] {
-                if (const auto self = weak.lock())
-                    self->recordsRead(records);
-            });
+            main->async(weakly(weak, &LocalActivityHandOver::recordsRead, readRecords(layout, now)));
         });
 }
 
@@ -145,10 +138,7 @@ void LocalActivityHandOver::recordsRead(Records records)
         _cloud->items().decodeBookmark(*bookmarkOf(record),
             [weak = weak_from_this(), reading = _reading, record, main = _dispatch->mainQueue()](
                 const platform::Result<platform::Url>& document) {
-                main->async([weak, reading, record, document] {
-                    if (const auto self = weak.lock())
-                        self->documentDecided(reading, record, document);
-                });
+                main->async(weakly(weak, &LocalActivityHandOver::documentDecided, reading, record, document));
             });
     }
     if (records.empty())
@@ -190,11 +180,11 @@ void LocalActivityHandOver::readAgainWhenOneIsOld()
     const auto age = _dispatch->now().nanoseconds - _offers.back().time.nanoseconds;
     const auto left =
         ActivityPublication::longestSilence - platform::Duration(std::max<std::int64_t>(age, 0));
-    _dispatch->after(left, _dispatch->mainQueue(), [weak = weak_from_this(), reading = _reading] {
-        const auto self = weak.lock();
-        if (self && self->_reading == reading)
-            self->readAgain();
-    });
+    _dispatch->after(
+        left, _dispatch->mainQueue(), weakly(this, [reading = _reading](LocalActivityHandOver& self) {
+            if (self._reading == reading)
+                self.readAgain();
+        }));
 }
 
 } // namespace host::drive

@@ -5,6 +5,7 @@
 
 #include "host/drive/changes/LocalCloudStore.h"
 #include "host/drive/changes/Recovery.h"
+#include "platform/Weakly.h"
 
 namespace host::drive {
 
@@ -34,10 +35,7 @@ LocalCloudDocumentService::LocalCloudDocumentService(
     , _monitor(AccountMonitor::start(layout, dependencies))
 {
     Recovery(layout, *_store).run();
-    _monitor->onFileChanged([weak = std::weak_ptr(_storageOffers)] {
-        if (const auto offers = weak.lock())
-            offers->accountFileChanged();
-    });
+    _monitor->onFileChanged(platform::weakly(_storageOffers, &LocalStorageOfferManager::accountFileChanged));
 }
 
 } // namespace host::drive

@@ -6,6 +6,7 @@
 #include "host/drive/records/JsonObject.h"
 #include "host/drive/records/SmallFile.h"
 #include "platform/Log.h"
+#include "platform/Weakly.h"
 
 namespace host::drive {
 
@@ -15,6 +16,7 @@ using nlohmann::json;
 using platform::PropertyArray;
 using platform::PropertyDictionary;
 using platform::PropertyValue;
+using platform::weakly;
 
 PropertyValue valueOf(const json& value);
 
@@ -94,11 +96,10 @@ void LocalKeyValueStore::begin()
     static constexpr platform::Operation op{"-[LocalKeyValueStore begin]"};
     // The folder is watched rather than the file, so that its creation and its replacement are seen.
     _folder = FollowedFolder::follow(_dispatch, _layout.home(), FollowedFolder::IfMissing::Wait,
-        [weak = weak_from_this()](const auto& names) {
-            const auto self = weak.lock();
-            if (self && mayHaveChanged(names, DriveLayout::keyValueFileName))
-                self->readAgain();
-        });
+        weakly(this, [](LocalKeyValueStore& self, const std::vector<std::string>& names) {
+            if (mayHaveChanged(names, DriveLayout::keyValueFileName))
+                self.readAgain();
+        }));
     if (!_folder->isWatched())
         op.warning("Cannot watch the key-value store's folder %@", _layout.home());
 }
@@ -116,10 +117,7 @@ void LocalKeyValueStore::readAgain()
                       main = _dispatch->mainQueue()] {
         // Before the reading, so that a change during it leads to another one.
         waits->store(false);
-        main->async([weak, values = readValues(path)] {
-            if (const auto self = weak.lock())
-                self->valuesRead(values);
-        });
+        main->async(weakly(weak, &LocalKeyValueStore::valuesRead, readValues(path)));
     });
 }
 

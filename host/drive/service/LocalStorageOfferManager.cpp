@@ -7,12 +7,14 @@
 #include "host/drive/records/StorageSpace.h"
 #include "platform/Log.h"
 #include "platform/Url.h"
+#include "platform/Weakly.h"
 
 namespace host::drive {
 
 namespace {
 
 using platform::StorageOffer;
+using platform::weakly;
 
 std::optional<StorageOffer> readOffer(const DriveLayout& layout)
 {
@@ -63,10 +65,7 @@ void LocalStorageOfferManager::fetch()
     if (_state == State::NeverRead)
         _state = State::Reading;
     _queue->async([weak = weak_from_this(), layout = _layout, main = _dispatch->mainQueue()] {
-        main->async([weak, offer = readOffer(layout)] {
-            if (const auto self = weak.lock())
-                self->offerRead(offer);
-        });
+        main->async(weakly(weak, &LocalStorageOfferManager::offerRead, readOffer(layout)));
     });
 }
 

@@ -4,6 +4,7 @@
 #include "host/drive/service/RunningDownloads.h"
 
 #include "platform/Url.h"
+#include "platform/Weakly.h"
 
 #include <utility>
 
@@ -12,6 +13,7 @@ namespace host::drive {
 using platform::DownloadHandlers;
 using platform::DownloadProgress;
 using platform::Error;
+using platform::weakly;
 
 /// What the one who asked holds.
 class RunningDownloads::Handle : public platform::ItemDownload {
@@ -61,14 +63,7 @@ RunningDownloads::Ticket RunningDownloads::join(const std::string& path, Downloa
     running->second.listeners.emplace(++_lastTicket, std::move(handlers));
     if (isNew) {
         running->second.work = LocalDownload::start(_setting, path,
-            {[weak = weak_from_this(), path](const DownloadProgress& progress) {
-                 if (const auto self = weak.lock())
-                     self->arrived(path, progress);
-             },
-                [weak = weak_from_this(), path](const std::optional<Error>& error) {
-                    if (const auto self = weak.lock())
-                        self->ended(path, error);
-                }});
+            {weakly(this, &RunningDownloads::arrived, path), weakly(this, &RunningDownloads::ended, path)});
         tellSoon(path);
     }
     return _lastTicket;
@@ -106,10 +101,8 @@ void RunningDownloads::cancel(const std::string& path)
             return;
         running->second.work->cancel();
     }
-    _setting.mainQueue->async([weak = weak_from_this(), path] {
-        if (const auto self = weak.lock())
-            self->ended(path, Error(platform::FileErrorCode::Cancelled));
-    });
+    _setting.mainQueue->async(
+        weakly(this, &RunningDownloads::ended, path, Error(platform::FileErrorCode::Cancelled)));
 }
 
 std::map<RunningDownloads::Ticket, DownloadHandlers> RunningDownloads::listenersOf(
@@ -156,10 +149,7 @@ void RunningDownloads::ended(const std::string& path, const std::optional<Error>
 
 void RunningDownloads::tellSoon(const std::string& path)
 {
-    _setting.mainQueue->async([weak = weak_from_this(), path] {
-        if (const auto self = weak.lock())
-            self->tell(path);
-    });
+    _setting.mainQueue->async(weakly(this, &RunningDownloads::tell, path));
 }
 
 void RunningDownloads::tell(const std::string& path)

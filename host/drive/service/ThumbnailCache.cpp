@@ -4,6 +4,7 @@
 #include "host/drive/service/ThumbnailCache.h"
 
 #include "platform/Log.h"
+#include "platform/Weakly.h"
 
 #include <gdk-pixbuf/gdk-pixbuf.h>
 #include <unistd.h>
@@ -16,6 +17,7 @@ namespace host::drive {
 namespace {
 
 using platform::Image;
+using platform::weakly;
 
 struct Unref {
     void operator()(GdkPixbuf* pixbuf) const { g_object_unref(pixbuf); }
@@ -159,13 +161,17 @@ void ThumbnailCache::makeLater(const std::string& path, platform::Date modified)
     const std::lock_guard lock(_mutex);
     if (!_beingMade.insert(path).second)
         return;
-    _queue->addOperation([weak = weak_from_this(), folder = _folder, path, modified] {
-        make(folder, path, modified);
-        if (const auto self = weak.lock()) {
-            const std::lock_guard inner(self->_mutex);
-            self->_beingMade.erase(path);
-        }
-    });
+    _queue->addOperation(
+        [done = weakly(this, &ThumbnailCache::wasMade, path), folder = _folder, path, modified] {
+            make(folder, path, modified);
+            done();
+        });
+}
+
+void ThumbnailCache::wasMade(const std::string& path)
+{
+    const std::lock_guard lock(_mutex);
+    _beingMade.erase(path);
 }
 
 } // namespace host::drive

@@ -38,6 +38,7 @@ private:
     ThumbnailCache(std::string folder, std::shared_ptr<platform::Dispatch> dispatch);
 
     void makeLater(const std::string& path, platform::Date modified);
+    void wasMade(const std::string& path);
 
     std::string _folder;
     std::shared_ptr<platform::Dispatch> _dispatch;
