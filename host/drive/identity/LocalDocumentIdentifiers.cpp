@@ -51,7 +51,7 @@ LocalDocumentIdentifiers::LocalDocumentIdentifiers(
     const DriveLayout& layout, const std::shared_ptr<platform::Dispatch>& dispatch)
     : _layout(layout)
     , _index(layout.index())
-    , _search(layout)
+    , _finder(layout)
     , _dispatch(dispatch)
     , _queue(dispatch->makeSerialQueue("TarrowDriveAppID.identifiers"))
 {
@@ -143,12 +143,12 @@ std::optional<DocumentPlace> LocalDocumentIdentifiers::locate(const IdentifiedPl
             best = item->place();
         if (best && known.place.inode == 0)
             return best;
-        const auto inFolder = _search.findInFolderOf(known, effort).place;
+        const auto inFolder = _finder.findInFolderOf(known, effort).place;
         if (inFolder && (inFolder->inode == known.place.inode || known.place.inode == 0))
             return inFolder;
         best = best ? best : inFolder;
     }
-    const auto inDrive = _search.findInDrive(known, effort).place;
+    const auto inDrive = _finder.findInDrive(known, effort).place;
     if (inDrive && (!best || inDrive->inode == known.place.inode))
         return inDrive;
     return best;
@@ -178,7 +178,7 @@ void LocalDocumentIdentifiers::rebuild()
 {
     if (_index.state() == DocumentIndex::State::Unavailable)
         return;
-    auto all = _search.findAll();
+    auto all = _finder.findAll();
     // What the index knows and what is there counts before what is older: a copy may have an older date.
     std::erase_if(all, [this](const auto& found) {
         const auto answer = _index.lookUp(found.identifier);

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "host/drive/identity/DocumentSearch.h"
+#include "host/drive/identity/DocumentFinder.h"
 #include "platform/Dispatch.h"
 #include "platform/DocumentIdentifiers.h"
 
@@ -26,7 +26,7 @@ class IdentifiedItem;
 class LocalDocumentIdentifiers : public platform::DocumentIdentifiers,
                                  public std::enable_shared_from_this<LocalDocumentIdentifiers> {
 public:
-    using Effort = DocumentSearch::Effort;
+    using Effort = DocumentFinder::Effort;
 
     static std::shared_ptr<LocalDocumentIdentifiers> create(
         const DriveLayout& layout, const std::shared_ptr<platform::Dispatch>& dispatch);
@@ -69,7 +69,7 @@ private:
 
     DriveLayout _layout;
     DocumentIndex _index;
-    DocumentSearch _search;
+    DocumentFinder _finder;
     std::shared_ptr<platform::Dispatch> _dispatch;
     std::shared_ptr<platform::Queue> _queue;
     std::mutex _mutex; ///< for what follows

@@ -10,7 +10,7 @@ namespace host::drive {
 
 /// Looks through the drive for what carries document identifiers. Nothing is opened for long and no link
 /// followed; where two items carry one identifier (a copy with its attributes), the older one counts.
-class DocumentSearch {
+class DocumentFinder {
 public:
     /// How many names one search looks at.
     enum class Effort : std::size_t {
@@ -18,7 +18,7 @@ public:
         Whole = 100'000'000,
     };
 
-    explicit DocumentSearch(DriveLayout layout)
+    explicit DocumentFinder(DriveLayout layout)
         : _layout(std::move(layout))
     {
     }

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "host/drive/identity/DocumentSearch.h"
+#include "host/drive/identity/DocumentFinder.h"
 
 #include "host/drive/changes/WorkRecord.h"
 #include "host/drive/identity/IdentifiedItem.h"
@@ -91,7 +91,7 @@ Continue goOn(const Url&, const platform::Error&)
 
 } // namespace
 
-DocumentSearch::Finding DocumentSearch::find(
+DocumentFinder::Finding DocumentFinder::find(
     const std::string& folder, Depth depth, const IdentifiedPlace& known, Effort effort) const
 {
     std::optional<Candidate> best;
@@ -119,7 +119,7 @@ DocumentSearch::Finding DocumentSearch::find(
     return finding;
 }
 
-DocumentSearch::Finding DocumentSearch::findInFolderOf(const IdentifiedPlace& known, Effort effort) const
+DocumentFinder::Finding DocumentFinder::findInFolderOf(const IdentifiedPlace& known, Effort effort) const
 {
     const auto path = _layout.home() + '/' + known.place.path;
     const auto folder = path.substr(0, path.find_last_of('/'));
@@ -128,12 +128,12 @@ DocumentSearch::Finding DocumentSearch::findInFolderOf(const IdentifiedPlace& kn
     return find(folder, Depth::Folder, known, effort);
 }
 
-DocumentSearch::Finding DocumentSearch::findInDrive(const IdentifiedPlace& known, Effort effort) const
+DocumentFinder::Finding DocumentFinder::findInDrive(const IdentifiedPlace& known, Effort effort) const
 {
     return find(_layout.documents(), Depth::Everything, known, effort);
 }
 
-std::vector<IdentifiedPlace> DocumentSearch::findAll() const
+std::vector<IdentifiedPlace> DocumentFinder::findAll() const
 {
     std::map<std::uint32_t, Candidate> found;
     const DeepEnumeration::EntryHandler entry = [&](const Url& url, FileType type) {
