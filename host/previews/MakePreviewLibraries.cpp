@@ -3,16 +3,16 @@
 
 #include "host/previews/MakePreviewLibraries.h"
 
-#include "host/previews/MediaNative.h"
+#include "host/previews/MediaPeer.h"
 #include "host/previews/PdfPrinting.h"
 #include "host/previews/PopplerDocuments.h"
-#include "host/previews/TextNative.h"
+#include "host/previews/TextPeer.h"
 #include "host/previews/UchardetDecoder.h"
 
 namespace host::previews {
 
 namespace {
-using gtk::PreviewNative;
+using gtk::PreviewPeer;
 
 class Libraries : public gtk::PreviewLibraries {
 public:
@@ -23,15 +23,15 @@ public:
     {
         return previews::readPrintablePdf(path);
     }
-    std::shared_ptr<PreviewNative> makeTextNative(
+    std::shared_ptr<PreviewPeer> makeTextPeer(
         const std::shared_ptr<screens::PreviewTextView>& view) const override
     {
-        return std::make_shared<TextNative>(view);
+        return std::make_shared<TextPeer>(view);
     }
-    std::shared_ptr<PreviewNative> makeMediaNative(
+    std::shared_ptr<PreviewPeer> makeMediaPeer(
         const std::shared_ptr<screens::PreviewMediaView>& view) const override
     {
-        return std::make_shared<MediaNative>(view);
+        return std::make_shared<MediaPeer>(view);
     }
 
 private:

@@ -25,7 +25,7 @@ public:
     }
 
     const std::string& text() const { return _text; }
-    /// Event up: the native view now shows this text.
+    /// Event up: the peer now shows this text.
     void userEdited(std::string text) { _text = std::move(text); }
 
 private:

@@ -83,7 +83,7 @@ void PreviewPagesView::setDocument(std::shared_ptr<PagedDocument> document, Size
     _knowsSizes = count < 2;
     if (!query().empty())
         queryDidChange();
-    native().notify([](auto& native) { native.previewContentDidChange(); });
+    peer().notify([](auto& peer) { peer.previewContentDidChange(); });
     stateDidChange();
     drawNext();
 }
@@ -98,7 +98,7 @@ void PreviewPagesView::readPageSizes()
                 sizes.push_back(document.pageSize(page));
             return [sizes](PreviewPagesView& view) {
                 view._deck.setPages(sizes);
-                view.native().notify([](auto& native) { native.previewContentDidChange(); });
+                view.peer().notify([](auto& peer) { peer.previewContentDidChange(); });
                 view.drawNext();
             };
         },
@@ -107,7 +107,7 @@ void PreviewPagesView::readPageSizes()
 
 void PreviewPagesView::needsDisplay()
 {
-    native().notify([](auto& native) { native.previewNeedsDisplay(); });
+    peer().notify([](auto& peer) { peer.previewNeedsDisplay(); });
 }
 
 void PreviewPagesView::userResized(double width, double scale)
@@ -115,7 +115,7 @@ void PreviewPagesView::userResized(double width, double scale)
     _deck.setWindow(width, scale);
 }
 
-void PreviewPagesView::nativeShowsZoom(double zoom)
+void PreviewPagesView::peerShowsZoom(double zoom)
 {
     _deck.setZoom(zoom);
     userZoomed(zoom);
@@ -141,7 +141,7 @@ void PreviewPagesView::goToPage(std::size_t page)
     auto place = _deck.pageFrame(page);
     place.y -= PageDeck::gap * zoom();
     place.height = _visible.height;
-    native().notify([&](auto& native) { native.previewShouldScrollTo(place); });
+    peer().notify([&](auto& peer) { peer.previewShouldScrollTo(place); });
 }
 
 void PreviewPagesView::drawNext()
@@ -258,7 +258,7 @@ void PreviewPagesView::reveal(const Rect& content)
         return;
     place.y -= _visible.height * aboveMatch;
     place.height = _visible.height;
-    native().notify([&](auto& native) { native.previewShouldScrollTo(place); });
+    peer().notify([&](auto& peer) { peer.previewShouldScrollTo(place); });
 }
 
 void PreviewPagesView::showMatch(MatchStep step)

@@ -51,10 +51,10 @@ public:
     /// anything was visible.
     std::optional<Point> visiblePlace() const;
 
-    // Events up: the host reports what the native view shows.
+    // Events up: the host reports what its peer shows.
     void userResized(double width, double scale);
     void userSees(const Rect& content);
-    void nativeShowsZoom(double zoom); ///< lays the pages out for it
+    void peerShowsZoom(double zoom); ///< lays the pages out for it
 
     /// Answers the known matches of a page in page points.
     const std::vector<Rect>& matchesOn(std::size_t page) const;

@@ -11,7 +11,7 @@ void PreviewPictureView::setPicture(Picture picture)
 {
     _picture = std::move(picture);
     _asked = false;
-    native().notify([](auto& native) { native.previewContentDidChange(); });
+    peer().notify([](auto& peer) { peer.previewContentDidChange(); });
 }
 
 void PreviewPictureView::userSeesPixels(double width)

@@ -29,7 +29,7 @@ public:
     /// The callback runs when the picture is shown larger than its pixels and the file has more of them, once
     /// for each picture.
     void setOnNeedsPixels(std::function<void()> callback) { _onNeedsPixels = std::move(callback); }
-    /// Event up: the native view shows the picture this many device pixels wide.
+    /// Event up: the peer shows the picture this many device pixels wide.
     void userSeesPixels(double width);
 
 private:

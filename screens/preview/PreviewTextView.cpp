@@ -10,7 +10,7 @@ namespace screens {
 void PreviewTextView::setText(Content content)
 {
     _content = std::move(content);
-    native().notify([](auto& native) { native.previewContentDidChange(); });
+    peer().notify([](auto& peer) { peer.previewContentDidChange(); });
 }
 
 } // namespace screens

@@ -14,7 +14,7 @@ void PreviewView::setZoom(double zoom)
     if (kept == _zoom)
         return;
     _zoom = kept;
-    _native.notify([](auto& native) { native.previewZoomDidChange(); });
+    _peer.notify([](auto& peer) { peer.previewZoomDidChange(); });
     stateDidChange();
 }
 
@@ -32,13 +32,13 @@ void PreviewView::setQuery(std::string query)
     _query = std::move(query);
     _search = {};
     queryDidChange();
-    _native.notify([](auto& native) { native.previewQueryDidChange(); });
+    _peer.notify([](auto& peer) { peer.previewQueryDidChange(); });
     stateDidChange();
 }
 
 void PreviewView::showMatch(MatchStep step)
 {
-    _native.notify([step](auto& native) { native.previewShouldShowMatch(step); });
+    _peer.notify([step](auto& peer) { peer.previewShouldShowMatch(step); });
 }
 
 void PreviewView::setSearchState(const SearchState& state)
@@ -51,17 +51,17 @@ void PreviewView::setSearchState(const SearchState& state)
 
 void PreviewView::stop()
 {
-    _native.notify([](auto& native) { native.previewShouldStop(); });
+    _peer.notify([](auto& peer) { peer.previewShouldStop(); });
 }
 
 void PreviewView::takeFocus()
 {
-    _native.notify([](auto& native) { native.previewShouldTakeFocus(); });
+    _peer.notify([](auto& peer) { peer.previewShouldTakeFocus(); });
 }
 
 void PreviewView::copy()
 {
-    _native.notify([](auto& native) { native.previewShouldCopy(); });
+    _peer.notify([](auto& peer) { peer.previewShouldCopy(); });
 }
 
 void PreviewView::userWantsToFind()
@@ -70,7 +70,7 @@ void PreviewView::userWantsToFind()
         call();
 }
 
-void PreviewView::nativeFailed(const std::string& words)
+void PreviewView::peerFailed(const std::string& words)
 {
     if (const auto call = _onFailure)
         call(words);

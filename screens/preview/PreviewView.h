@@ -25,7 +25,7 @@ struct SearchState {
     bool operator==(const SearchState&) const = default;
 };
 
-/// Calls down that a preview makes to its native view. Main thread.
+/// Calls down that a preview makes to its peer. Main thread.
 class PreviewViewObserver {
 public:
     virtual ~PreviewViewObserver() = default;
@@ -40,25 +40,25 @@ public:
     virtual void previewShouldCopy() { } ///< copies the selection to the clipboard
 };
 
-/// The view of a document's content, and the commands of its toolbar and keys. The host makes the native view
-/// by the kind. New content of the same kind is put into the same view, which keeps place, zoom and search.
+/// The view of a document's content, and the commands of its toolbar and keys. The host makes the peer by
+/// the kind. New content of the same kind is put into the same view, which keeps place, zoom and search.
 /// Main thread only.
 class PreviewView : public kit::HostedView {
 public:
     using kit::HostedView::HostedView;
 
-    void setPreviewObserver(std::weak_ptr<PreviewViewObserver> observer) { _native.set(std::move(observer)); }
+    void setPreviewObserver(std::weak_ptr<PreviewViewObserver> observer) { _peer.set(std::move(observer)); }
 
     virtual bool canZoom() const { return false; }
     virtual bool canSearch() const { return false; }
-    /// Answers whether something is selected that the native view does not copy by itself.
+    /// Answers whether something is selected that the peer does not copy by itself.
     virtual bool canCopy() const { return false; }
 
     static constexpr double minZoom = 1, maxZoom = 12; ///< 1 fits the window
     static constexpr double zoomStep = 1.5; ///< factor of one press of a button or key
     double zoom() const { return _zoom; }
     void setZoom(double zoom); ///< by the program; kept within the limits
-    void userZoomed(double zoom); ///< event up: the native view now shows this zoom
+    void userZoomed(double zoom); ///< event up: the peer now shows this zoom
 
     const std::string& query() const { return _query; }
     /// Searches for a text regardless of case and marks the first match after the visible place. An empty
@@ -77,17 +77,17 @@ public:
     /// The callback runs when the user presses the keys that begin a search.
     void setOnFind(std::function<void()> callback) { _onFind = std::move(callback); }
     void userWantsToFind();
-    /// The callback runs with a sentence when the native view cannot show the content.
+    /// The callback runs with a sentence when the peer cannot show the content.
     void setOnFailure(std::function<void(const std::string&)> callback) { _onFailure = std::move(callback); }
-    void nativeFailed(const std::string& words);
+    void peerFailed(const std::string& words);
 
 protected:
     virtual void queryDidChange() { }
-    const kit::ObserverSlot<PreviewViewObserver>& native() const { return _native; }
+    const kit::ObserverSlot<PreviewViewObserver>& peer() const { return _peer; }
     void stateDidChange();
 
 private:
-    kit::ObserverSlot<PreviewViewObserver> _native;
+    kit::ObserverSlot<PreviewViewObserver> _peer;
     double _zoom = minZoom;
     std::string _query;
     SearchState _search;

@@ -137,7 +137,7 @@ TEST_F(PreviewEditingTest, SavesWhenThePersonIsDoneAndGoesOnShowingThePlace)
 {
     show(formPdf());
     pages().userResized(224, 1);
-    pages().nativeShowsZoom(2);
+    pages().peerShowsZoom(2);
     pages().userSees({0, 300, 224, 300});
     edit();
     EXPECT_TRUE(preview->screenView()->toolbar()->isHidden());

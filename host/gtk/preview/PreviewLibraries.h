@@ -16,7 +16,7 @@ class PreviewTextView;
 
 namespace host::gtk {
 
-class PreviewNative;
+class PreviewPeer;
 class PrintablePages;
 
 /// The parts of the preview that need large libraries: documents of pages, coloured source code, films. They
@@ -33,10 +33,10 @@ public:
     /// document cannot be printed.
     virtual platform::Result<std::shared_ptr<PrintablePages>> readPrintablePdf(
         const std::string& path) const = 0;
-    /// Make the native sides of views, which are not started yet. Main thread.
-    virtual std::shared_ptr<PreviewNative> makeTextNative(
+    /// Make the peers of views, which are not started yet. Main thread.
+    virtual std::shared_ptr<PreviewPeer> makeTextPeer(
         const std::shared_ptr<screens::PreviewTextView>& view) const = 0;
-    virtual std::shared_ptr<PreviewNative> makeMediaNative(
+    virtual std::shared_ptr<PreviewPeer> makeMediaPeer(
         const std::shared_ptr<screens::PreviewMediaView>& view) const = 0;
 };
 

@@ -3,8 +3,8 @@
 
 #include "host/gtk/screens/WindowPeer.h"
 
-#include "host/gtk/preview/NoteNative.h"
-#include "host/gtk/preview/PreviewNative.h"
+#include "host/gtk/preview/NotePeer.h"
+#include "host/gtk/preview/PreviewPeer.h"
 #include "host/gtk/screens/LayerFactory.h"
 #include "kit/controllers/ViewController.h"
 #include "platform/Localization.h"

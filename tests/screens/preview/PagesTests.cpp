@@ -131,7 +131,7 @@ TEST(PageDeckTest, KeepsPicturesWithinItsLimits)
 }
 
 /// Records the places to which it was asked to scroll.
-struct Native : PreviewViewObserver {
+struct Peer : PreviewViewObserver {
     void previewShouldScrollTo(const Rect& content) override { places.push_back(content); }
     std::vector<Rect> places;
 };
@@ -140,7 +140,7 @@ class Pages : public ComponentsFixture {
 protected:
     Pages()
     {
-        view->setPreviewObserver(native);
+        view->setPreviewObserver(peer);
         view->userResized(224, 1);
     }
     std::shared_ptr<PagedDocument> write(const std::vector<std::string>& texts)
@@ -166,7 +166,7 @@ protected:
             && std::ranges::any_of(picture->pixels(), [](auto pixel) { return pixel == 0xFF000000; });
     }
 
-    std::shared_ptr<Native> native = std::make_shared<Native>();
+    std::shared_ptr<Peer> peer = std::make_shared<Peer>();
     std::shared_ptr<PreviewPagesView> view = std::make_shared<PreviewPagesView>();
 };
 
@@ -181,7 +181,7 @@ TEST_F(Pages, DrawsThePagesThatAreSeen)
     EXPECT_EQ(view->currentPage(), 4U);
     EXPECT_TRUE(hasInk(4));
     view->goToPage(2);
-    EXPECT_EQ(native->places.back().y, view->deck().pageFrame(2).y - PageDeck::gap);
+    EXPECT_EQ(peer->places.back().y, view->deck().pageFrame(2).y - PageDeck::gap);
 }
 
 TEST_F(Pages, FindsTextsFromThePageThatIsReadAndGoesAround)
@@ -192,7 +192,7 @@ TEST_F(Pages, FindsTextsFromThePageThatIsReadAndGoesAround)
     EXPECT_FALSE(view->searchState().isComplete);
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(view->searchState(), (SearchState{3, 2, true}));
-    ASSERT_EQ(native->places.size(), 1U);
+    ASSERT_EQ(peer->places.size(), 1U);
     const auto match = *view->currentMatch();
     EXPECT_EQ(view->deck().pageAt(match.midY()), 2U);
     // The line is 50 points from the left and 200 from the bottom of the page.
@@ -217,18 +217,18 @@ TEST_F(Pages, FindsTextsFromThePageThatIsReadAndGoesAround)
 TEST_F(Pages, KeepsPlaceZoomAndSearchWhenTheDocumentChanges)
 {
     show({"one", "two", "three"});
-    view->nativeShowsZoom(2);
+    view->peerShowsZoom(2);
     see(view->deck().pageFrame(2).y);
     view->setQuery("three");
     drive.dispatch->runUntilIdle();
-    native->places.clear();
+    peer->places.clear();
 
     show({"one", "two", "three", "three again"});
     EXPECT_EQ(view->pageCount(), 4U);
     EXPECT_EQ(view->currentPage(), 2U);
     EXPECT_EQ(view->zoom(), 2);
     EXPECT_EQ(view->searchState().matches, 2U);
-    EXPECT_TRUE(native->places.empty());
+    EXPECT_TRUE(peer->places.empty());
     EXPECT_TRUE(hasInk(2));
 
     // The document is truncated while it is shown. The part that can still be read is shown.

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "host/gtk/preview/PagesNative.h"
+#include "host/gtk/preview/PagesPeer.h"
 
 #include "host/gtk/base/ImagePaint.h"
 #include "platform/Localization.h"
@@ -45,13 +45,13 @@ void fill(GtkSnapshot* snapshot, const Rect& rect, const GdkRGBA& color)
 
 } // namespace
 
-PagesNative::PagesNative(const std::shared_ptr<PreviewPagesView>& view)
+PagesPeer::PagesPeer(const std::shared_ptr<PreviewPagesView>& view)
     : _view(view)
     , _scroller(*this, GTK_ACCESSIBLE_ROLE_DOCUMENT, ZoomScroller::Drag::IsForContent)
 {
 }
 
-void PagesNative::start()
+void PagesPeer::start()
 {
     addShortcuts(widget(), _view);
     addSelection();
@@ -71,7 +71,7 @@ void PagesNative::start()
     updateLabel();
 }
 
-void PagesNative::addSelection()
+void PagesPeer::addSelection()
 {
     auto* drag = gtk_gesture_drag_new();
     gtk_widget_add_controller(_scroller.canvas(), GTK_EVENT_CONTROLLER(drag));
@@ -111,7 +111,7 @@ void PagesNative::addSelection()
 }
 
 /// Recognises a tap that does not move. A longer press selects instead.
-void PagesNative::addTap()
+void PagesPeer::addTap()
 {
     auto* click = gtk_gesture_click_new();
     gtk_widget_add_controller(_scroller.canvas(), GTK_EVENT_CONTROLLER(click));
@@ -129,7 +129,7 @@ void PagesNative::addTap()
 }
 
 /// Handles Ctrl+Z wherever the focus is, except in a text that is being written, which undoes its own edits.
-void PagesNative::addUndo()
+void PagesPeer::addUndo()
 {
     auto* controller = gtk_shortcut_controller_new();
     gtk_shortcut_controller_set_scope(GTK_SHORTCUT_CONTROLLER(controller), GTK_SHORTCUT_SCOPE_GLOBAL);
@@ -148,7 +148,7 @@ void PagesNative::addUndo()
     gtk_widget_add_controller(widget(), controller);
 }
 
-void PagesNative::addKeys()
+void PagesPeer::addKeys()
 {
     auto* keys = gtk_event_controller_key_new();
     gtk_widget_add_controller(_scroller.canvas(), keys);
@@ -158,7 +158,7 @@ void PagesNative::addKeys()
         }));
 }
 
-bool PagesNative::pressed(guint key, bool withControl)
+bool PagesPeer::pressed(guint key, bool withControl)
 {
     const auto view = _view.lock();
     if (!view)
@@ -172,7 +172,7 @@ bool PagesNative::pressed(guint key, bool withControl)
     return true;
 }
 
-void PagesNative::previewShouldCopy()
+void PagesPeer::previewShouldCopy()
 {
     const auto view = _view.lock();
     const auto text = view ? view->selectedText() : std::string();
@@ -180,7 +180,7 @@ void PagesNative::previewShouldCopy()
         gdk_clipboard_set_text(gtk_widget_get_clipboard(widget()), text.c_str());
 }
 
-void PagesNative::updateLabel()
+void PagesPeer::updateLabel()
 {
     const auto view = _view.lock();
     if (!view || view->pageCount() == 0)
@@ -192,36 +192,36 @@ void PagesNative::updateLabel()
         GTK_ACCESSIBLE(_scroller.canvas()), GTK_ACCESSIBLE_PROPERTY_LABEL, label.c_str(), -1);
 }
 
-void PagesNative::previewContentDidChange()
+void PagesPeer::previewContentDidChange()
 {
     _scroller.contentDidChange();
     updateLabel();
 }
 
-void PagesNative::previewNeedsDisplay()
+void PagesPeer::previewNeedsDisplay()
 {
     const auto view = _view.lock();
     gtk_widget_set_cursor_from_name(_scroller.canvas(), view && view->isPlacing() ? "crosshair" : nullptr);
     gtk_widget_queue_draw(_scroller.canvas());
 }
 
-void PagesNative::previewZoomDidChange()
+void PagesPeer::previewZoomDidChange()
 {
     if (const auto view = _view.lock())
         _scroller.setZoom(view->zoom());
 }
 
-void PagesNative::previewShouldScrollTo(const Rect& content)
+void PagesPeer::previewShouldScrollTo(const Rect& content)
 {
     _scroller.scrollTo({content.x < _scroller.visible().x ? content.x : _scroller.visible().x, content.y});
 }
 
-void PagesNative::previewShouldTakeFocus()
+void PagesPeer::previewShouldTakeFocus()
 {
     gtk_widget_grab_focus(_scroller.canvas());
 }
 
-Size PagesNative::baseSize(Size window)
+Size PagesPeer::baseSize(Size window)
 {
     const auto view = _view.lock();
     if (!view)
@@ -232,13 +232,13 @@ Size PagesNative::baseSize(Size window)
     return {size.width / zoom, size.height / zoom};
 }
 
-void PagesNative::zoomed(double zoom)
+void PagesPeer::zoomed(double zoom)
 {
     if (const auto view = _view.lock())
-        view->nativeShowsZoom(zoom);
+        view->peerShowsZoom(zoom);
 }
 
-void PagesNative::sees(const Rect& visible)
+void PagesPeer::sees(const Rect& visible)
 {
     const auto view = _view.lock();
     if (!view)
@@ -249,7 +249,7 @@ void PagesNative::sees(const Rect& visible)
         updateLabel();
 }
 
-void PagesNative::draw(GtkSnapshot* snapshot, const Rect& visible)
+void PagesPeer::draw(GtkSnapshot* snapshot, const Rect& visible)
 {
     const auto view = _view.lock();
     if (!view || view->pageCount() == 0)
@@ -262,7 +262,7 @@ void PagesNative::draw(GtkSnapshot* snapshot, const Rect& visible)
         drawPage(snapshot, *view, page);
 }
 
-void PagesNative::drawPage(GtkSnapshot* snapshot, const PreviewPagesView& view, std::size_t page)
+void PagesPeer::drawPage(GtkSnapshot* snapshot, const PreviewPagesView& view, std::size_t page)
 {
     const auto& deck = view.deck();
     const auto frame = deck.pageFrame(page);
@@ -277,7 +277,7 @@ void PagesNative::drawPage(GtkSnapshot* snapshot, const PreviewPagesView& view, 
     drawMarks(snapshot, view, page);
 }
 
-void PagesNative::drawPicture(GtkSnapshot* snapshot, std::size_t key, const Image& picture, const Rect& place)
+void PagesPeer::drawPicture(GtkSnapshot* snapshot, std::size_t key, const Image& picture, const Rect& place)
 {
     auto found = _shown.find(key);
     if (found == _shown.end() || !(found->second.picture == picture))
@@ -286,7 +286,7 @@ void PagesNative::drawPicture(GtkSnapshot* snapshot, std::size_t key, const Imag
     gtk_snapshot_append_texture(snapshot, GDK_TEXTURE(found->second.texture.get()), &where);
 }
 
-void PagesNative::drawMarks(GtkSnapshot* snapshot, const PreviewPagesView& view, std::size_t page)
+void PagesPeer::drawMarks(GtkSnapshot* snapshot, const PreviewPagesView& view, std::size_t page)
 {
     const auto& deck = view.deck();
     for (const auto& match : view.matchesOn(page))
@@ -301,7 +301,7 @@ void PagesNative::drawMarks(GtkSnapshot* snapshot, const PreviewPagesView& view,
         fill(snapshot, deck.toContent(page, place), selectedColor);
 }
 
-void PagesNative::drawFields(GtkSnapshot* snapshot, const PreviewPagesView& view, std::size_t page)
+void PagesPeer::drawFields(GtkSnapshot* snapshot, const PreviewPagesView& view, std::size_t page)
 {
     const auto* active = view.activeField();
     for (const auto& field : view.fields()) {
@@ -320,7 +320,7 @@ void PagesNative::drawFields(GtkSnapshot* snapshot, const PreviewPagesView& view
     }
 }
 
-void PagesNative::drawBroken(GtkSnapshot* snapshot, const Rect& frame)
+void PagesPeer::drawBroken(GtkSnapshot* snapshot, const Rect& frame)
 {
     constexpr GdkRGBA ink{0.35F, 0.35F, 0.35F, 1};
     constexpr double margin = 16;

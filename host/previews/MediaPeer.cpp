@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "host/previews/MediaNative.h"
+#include "host/previews/MediaPeer.h"
 
 #include "host/previews/MediaSupport.h"
 #include "platform/Localization.h"
@@ -40,38 +40,38 @@ void nameControls(GtkWidget* player, const std::string& button)
 
 } // namespace
 
-MediaNative::MediaNative(const std::shared_ptr<PreviewMediaView>& view)
+MediaPeer::MediaPeer(const std::shared_ptr<PreviewMediaView>& view)
     : _view(view)
     , _box(ObjectRef<GtkWidget>::retain(gtk_box_new(GTK_ORIENTATION_VERTICAL, spacing)))
 {
 }
 
-MediaNative::~MediaNative()
+MediaPeer::~MediaPeer()
 {
     close();
 }
 
-void MediaNative::start()
+void MediaPeer::start()
 {
     previewContentDidChange();
 }
 
-void MediaNative::previewContentDidChange()
+void MediaPeer::previewContentDidChange()
 {
     close();
     MediaSupport::check(
-        platform::weakly(this, [generation = ++_generation](MediaNative& self, const std::string& missing) {
+        platform::weakly(this, [generation = ++_generation](MediaPeer& self, const std::string& missing) {
             const auto view = self._generation == generation ? self._view.lock() : nullptr;
             if (!view)
                 return;
             if (missing.empty())
                 self.open();
             else
-                view->nativeFailed(missing);
+                view->peerFailed(missing);
         }));
 }
 
-void MediaNative::open()
+void MediaPeer::open()
 {
     const auto view = _view.lock();
     if (!view)
@@ -85,7 +85,7 @@ void MediaNative::open()
         showSound(media);
 }
 
-void MediaNative::showFilm()
+void MediaPeer::showFilm()
 {
     _player = gtk_video_new_for_media_stream(_stream.get());
     gtk_widget_set_vexpand(_player, TRUE);
@@ -94,7 +94,7 @@ void MediaNative::showFilm()
     nameControls(_player, platform::localized("Play or Pause"));
 }
 
-void MediaNative::showSound(const PreviewMediaView::Content& media)
+void MediaPeer::showSound(const PreviewMediaView::Content& media)
 {
     _player = gtk_box_new(GTK_ORIENTATION_VERTICAL, spacing);
     gtk_widget_set_valign(_player, GTK_ALIGN_CENTER);
@@ -115,15 +115,15 @@ void MediaNative::showSound(const PreviewMediaView::Content& media)
     gtk_box_append(GTK_BOX(widget()), _player);
 }
 
-void MediaNative::checkError()
+void MediaPeer::checkError()
 {
     const auto* error = gtk_media_stream_get_error(_stream.get());
     const auto view = _view.lock();
     if (error && view)
-        view->nativeFailed(MediaSupport::wordsFor(g_quark_to_string(error->domain), error->code));
+        view->peerFailed(MediaSupport::wordsFor(g_quark_to_string(error->domain), error->code));
 }
 
-void MediaNative::close()
+void MediaPeer::close()
 {
     _streamConnections.clear();
     previewShouldStop();
@@ -134,13 +134,13 @@ void MediaNative::close()
     _stream.reset();
 }
 
-void MediaNative::previewShouldStop()
+void MediaPeer::previewShouldStop()
 {
     if (_stream)
         gtk_media_stream_pause(_stream.get());
 }
 
-void MediaNative::previewShouldTakeFocus()
+void MediaPeer::previewShouldTakeFocus()
 {
     gtk_widget_child_focus(widget(), GTK_DIR_TAB_FORWARD);
 }

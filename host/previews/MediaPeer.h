@@ -3,16 +3,16 @@
 
 #pragma once
 
-#include "host/gtk/preview/PreviewNative.h"
+#include "host/gtk/preview/PreviewPeer.h"
 #include "screens/preview/PreviewMediaView.h"
 
 namespace host::previews {
 
 /// Plays sounds and films in the toolkit's player.
-class MediaNative : public gtk::PreviewNative {
+class MediaPeer : public gtk::PreviewPeer {
 public:
-    explicit MediaNative(const std::shared_ptr<screens::PreviewMediaView>& view);
-    ~MediaNative() override;
+    explicit MediaPeer(const std::shared_ptr<screens::PreviewMediaView>& view);
+    ~MediaPeer() override;
 
     GtkWidget* widget() const override { return _box.get(); }
     GtkMediaStream* stream() const { return _stream.get(); } ///< null: none yet

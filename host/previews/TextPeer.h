@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "host/gtk/preview/PreviewNative.h"
+#include "host/gtk/preview/PreviewPeer.h"
 #include "screens/preview/PreviewTextView.h"
 
 #include <gtksourceview/gtksource.h>
@@ -14,10 +14,10 @@ namespace host::previews {
 
 /// Shows a text to be read and selected, and source code in the colours of its language. A long text is
 /// inserted piece by piece. When a text changes, only the different part is replaced.
-class TextNative : public gtk::PreviewNative {
+class TextPeer : public gtk::PreviewPeer {
 public:
-    explicit TextNative(const std::shared_ptr<screens::PreviewTextView>& view);
-    ~TextNative() override;
+    explicit TextPeer(const std::shared_ptr<screens::PreviewTextView>& view);
+    ~TextPeer() override;
 
     GtkWidget* widget() const override { return _window.get(); }
     GtkTextView* textView() const { return GTK_TEXT_VIEW(_text); }

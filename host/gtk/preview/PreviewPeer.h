@@ -15,9 +15,8 @@ namespace host::gtk {
 
 class PreviewModule;
 
-/// The native side of a previewed document's view. It lives as long as its widget. Main thread only.
-class PreviewNative : public screens::PreviewViewObserver,
-                      public std::enable_shared_from_this<PreviewNative> {
+/// Shows a previewed document's view with a native widget, and lives as long as the widget. Main thread only.
+class PreviewPeer : public screens::PreviewViewObserver, public std::enable_shared_from_this<PreviewPeer> {
 public:
     virtual GtkWidget* widget() const = 0;
     /// Shows the view for the first time.

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "host/gtk/preview/PreviewNative.h"
+#include "host/gtk/preview/PreviewPeer.h"
 #include "host/gtk/preview/ZoomScroller.h"
 #include "screens/preview/PreviewPictureView.h"
 
@@ -13,10 +13,10 @@ namespace host::gtk {
 
 /// Shows a picture in tiles, so that a large one costs only its visible part. It shows an animation frame by
 /// frame.
-class PictureNative : public PreviewNative, private ZoomContent {
+class PicturePeer : public PreviewPeer, private ZoomContent {
 public:
-    explicit PictureNative(const std::shared_ptr<screens::PreviewPictureView>& view);
-    ~PictureNative() override;
+    explicit PicturePeer(const std::shared_ptr<screens::PreviewPictureView>& view);
+    ~PicturePeer() override;
 
     GtkWidget* widget() const override { return _scroller.widget(); }
     void start() override;

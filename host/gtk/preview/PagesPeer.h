@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "host/gtk/preview/PreviewNative.h"
+#include "host/gtk/preview/PreviewPeer.h"
 #include "host/gtk/preview/ZoomScroller.h"
 #include "screens/preview/PreviewPagesView.h"
 
@@ -12,9 +12,9 @@
 namespace host::gtk {
 
 /// Shows a document's pages one below the other, with the matches of a search and the selection.
-class PagesNative : public PreviewNative, private ZoomContent {
+class PagesPeer : public PreviewPeer, private ZoomContent {
 public:
-    explicit PagesNative(const std::shared_ptr<screens::PreviewPagesView>& view);
+    explicit PagesPeer(const std::shared_ptr<screens::PreviewPagesView>& view);
 
     GtkWidget* widget() const override { return _scroller.widget(); }
     void start() override;

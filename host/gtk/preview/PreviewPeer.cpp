@@ -1,10 +1,10 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "host/gtk/preview/PreviewNative.h"
+#include "host/gtk/preview/PreviewPeer.h"
 
-#include "host/gtk/preview/PagesNative.h"
-#include "host/gtk/preview/PictureNative.h"
+#include "host/gtk/preview/PagesPeer.h"
+#include "host/gtk/preview/PicturePeer.h"
 #include "host/gtk/preview/PreviewModule.h"
 #include "platform/Weakly.h"
 #include "screens/preview/PreviewMediaView.h"
@@ -19,21 +19,21 @@ using screens::PreviewView;
 
 namespace {
 
-constexpr const char* nativeKey = "trw-preview-native";
+constexpr const char* peerKey = "trw-preview-peer";
 
-using Native = std::shared_ptr<PreviewNative>;
+using Peer = std::shared_ptr<PreviewPeer>;
 
-void show(GtkWidget* holder, PreviewView& view, const Native& native)
+void show(GtkWidget* holder, PreviewView& view, const Peer& peer)
 {
-    native->start();
-    view.setPreviewObserver(native);
-    adw_bin_set_child(ADW_BIN(holder), native->widget());
-    // The native view owns its widgets, and the holder keeps the native view alive.
-    g_object_set_data_full(G_OBJECT(holder), nativeKey, std::make_unique<Native>(native).release(),
-        [](gpointer held) { delete static_cast<Native*>(held); });
+    peer->start();
+    view.setPreviewObserver(peer);
+    adw_bin_set_child(ADW_BIN(holder), peer->widget());
+    // The peer owns its widgets, and the holder keeps the peer alive.
+    g_object_set_data_full(G_OBJECT(holder), peerKey, std::make_unique<Peer>(peer).release(),
+        [](gpointer held) { delete static_cast<Peer*>(held); });
 }
 
-/// Registers a maker. `fill` puts the native view of a new view into its holder, at once or later.
+/// Registers a maker. `fill` puts the peer of a new view into its holder, at once or later.
 template <typename View, typename Fill>
 void addMaker(PeerContext& context, Fill fill)
 {
@@ -58,7 +58,7 @@ void addOwnMaker(PeerContext& context)
 
 template <typename View>
 void addModuleMaker(PeerContext& context, const std::shared_ptr<PreviewModule>& previews,
-    Native (PreviewLibraries::*make)(const std::shared_ptr<View>&) const)
+    Peer (PreviewLibraries::*make)(const std::shared_ptr<View>&) const)
 {
     addMaker<View>(
         context, [previews, make](const ObjectRef<GtkWidget>& holder, const std::shared_ptr<View>& view) {
@@ -67,7 +67,7 @@ void addModuleMaker(PeerContext& context, const std::shared_ptr<PreviewModule>& 
                     show(holder.get(), shown,
                         ((*libraries).*make)(std::static_pointer_cast<View>(shown.shared_from_this())));
                 else
-                    shown.nativeFailed(PreviewModule::missingWords());
+                    shown.peerFailed(PreviewModule::missingWords());
             }));
         });
 }
@@ -96,7 +96,7 @@ void addShortcut(GtkEventController* controller, const std::weak_ptr<PreviewView
 
 } // namespace
 
-void PreviewNative::addShortcuts(GtkWidget* widget, const std::weak_ptr<PreviewView>& view)
+void PreviewPeer::addShortcuts(GtkWidget* widget, const std::weak_ptr<PreviewView>& view)
 {
     auto* controller = gtk_shortcut_controller_new();
     gtk_shortcut_controller_set_scope(GTK_SHORTCUT_CONTROLLER(controller), GTK_SHORTCUT_SCOPE_GLOBAL);
@@ -117,10 +117,10 @@ void PreviewNative::addShortcuts(GtkWidget* widget, const std::weak_ptr<PreviewV
 
 void addPreviewMakers(PeerContext& context, const std::shared_ptr<PreviewModule>& previews)
 {
-    addOwnMaker<screens::PreviewPictureView, PictureNative>(context);
-    addOwnMaker<screens::PreviewPagesView, PagesNative>(context);
-    addModuleMaker(context, previews, &PreviewLibraries::makeTextNative);
-    addModuleMaker(context, previews, &PreviewLibraries::makeMediaNative);
+    addOwnMaker<screens::PreviewPictureView, PicturePeer>(context);
+    addOwnMaker<screens::PreviewPagesView, PagesPeer>(context);
+    addModuleMaker(context, previews, &PreviewLibraries::makeTextPeer);
+    addModuleMaker(context, previews, &PreviewLibraries::makeMediaPeer);
 }
 
 } // namespace host::gtk

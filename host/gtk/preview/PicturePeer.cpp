@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "host/gtk/preview/PictureNative.h"
+#include "host/gtk/preview/PicturePeer.h"
 
 #include <algorithm>
 #include <cmath>
@@ -34,18 +34,18 @@ ObjectRef<GdkTexture> partTexture(const Image& image, int x, int y, int width, i
 
 } // namespace
 
-PictureNative::PictureNative(const std::shared_ptr<PreviewPictureView>& view)
+PicturePeer::PicturePeer(const std::shared_ptr<PreviewPictureView>& view)
     : _view(view)
     , _scroller(*this, GTK_ACCESSIBLE_ROLE_IMG, ZoomScroller::Drag::Scrolls)
 {
 }
 
-PictureNative::~PictureNative()
+PicturePeer::~PicturePeer()
 {
     previewShouldStop();
 }
 
-void PictureNative::start()
+void PicturePeer::start()
 {
     addShortcuts(widget(), _view);
     // An animation runs only while the widget is visible.
@@ -58,7 +58,7 @@ void PictureNative::start()
     previewZoomDidChange();
 }
 
-void PictureNative::previewContentDidChange()
+void PicturePeer::previewContentDidChange()
 {
     const auto view = _view.lock();
     if (!view)
@@ -73,7 +73,7 @@ void PictureNative::previewContentDidChange()
     scheduleFrame();
 }
 
-void PictureNative::makeTiles()
+void PicturePeer::makeTiles()
 {
     _tiles.clear();
     if (_picture.frames.empty())
@@ -85,7 +85,7 @@ void PictureNative::makeTiles()
     }
 }
 
-Size PictureNative::baseSize(Size window)
+Size PicturePeer::baseSize(Size window)
 {
     if (_picture.frames.empty())
         return _base = {};
@@ -97,7 +97,7 @@ Size PictureNative::baseSize(Size window)
     return _base = {width * fit, height * fit};
 }
 
-void PictureNative::draw(GtkSnapshot* snapshot, const Rect& visible)
+void PicturePeer::draw(GtkSnapshot* snapshot, const Rect& visible)
 {
     if (_picture.frames.empty() || _base.width <= 0)
         return;
@@ -111,7 +111,7 @@ void PictureNative::draw(GtkSnapshot* snapshot, const Rect& visible)
     }
 }
 
-void PictureNative::drawTile(GtkSnapshot* snapshot, Tile& tile, double pointsPerPixel)
+void PicturePeer::drawTile(GtkSnapshot* snapshot, Tile& tile, double pointsPerPixel)
 {
     if (!tile.texture)
         tile.texture = partTexture(frame(), tile.x, tile.y, tile.width, tile.height);
@@ -126,7 +126,7 @@ void PictureNative::drawTile(GtkSnapshot* snapshot, Tile& tile, double pointsPer
     gtk_snapshot_append_texture(snapshot, tile.texture.get(), &place);
 }
 
-void PictureNative::zoomed(double zoom)
+void PicturePeer::zoomed(double zoom)
 {
     const auto view = _view.lock();
     if (!view)
@@ -135,26 +135,26 @@ void PictureNative::zoomed(double zoom)
     view->userSeesPixels(_base.width * zoom * gtk_widget_get_scale_factor(widget()));
 }
 
-void PictureNative::sees(const Rect&) { }
+void PicturePeer::sees(const Rect&) { }
 
-void PictureNative::previewZoomDidChange()
+void PicturePeer::previewZoomDidChange()
 {
     if (const auto view = _view.lock())
         _scroller.setZoom(view->zoom());
 }
 
-void PictureNative::previewShouldStop()
+void PicturePeer::previewShouldStop()
 {
     if (_timer != 0)
         g_source_remove(std::exchange(_timer, 0));
 }
 
-void PictureNative::previewShouldTakeFocus()
+void PicturePeer::previewShouldTakeFocus()
 {
     gtk_widget_grab_focus(_scroller.canvas());
 }
 
-void PictureNative::scheduleFrame()
+void PicturePeer::scheduleFrame()
 {
     previewShouldStop();
     if (_picture.frames.size() < 2 || !gtk_widget_get_mapped(widget()))
@@ -162,13 +162,13 @@ void PictureNative::scheduleFrame()
     _timer = g_timeout_add(
         static_cast<guint>(_picture.frames[_frame].milliseconds),
         [](gpointer self) -> gboolean {
-            static_cast<PictureNative*>(self)->showNextFrame();
+            static_cast<PicturePeer*>(self)->showNextFrame();
             return G_SOURCE_REMOVE;
         },
         this);
 }
 
-void PictureNative::showNextFrame()
+void PicturePeer::showNextFrame()
 {
     _timer = 0;
     _frame = (_frame + 1) % _picture.frames.size();

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "host/gtk/preview/NoteNative.h"
+#include "host/gtk/preview/NotePeer.h"
 
 #include "host/gtk/base/Signal.h"
 #include "platform/Weakly.h"

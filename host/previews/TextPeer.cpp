@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "host/previews/TextNative.h"
+#include "host/previews/TextPeer.h"
 
 #include "host/previews/SourceLanguages.h"
 #include "platform/Weakly.h"
@@ -17,7 +17,7 @@ namespace host::previews {
 using gtk::connectNotify;
 using gtk::connectSignal;
 using gtk::ObjectRef;
-using gtk::PreviewNative;
+using gtk::PreviewPeer;
 using screens::MatchStep;
 using screens::PreviewTextView;
 using screens::PreviewView;
@@ -61,7 +61,7 @@ int charactersIn(const std::string& text, std::size_t bytes)
 
 } // namespace
 
-TextNative::TextNative(const std::shared_ptr<PreviewTextView>& view)
+TextPeer::TextPeer(const std::shared_ptr<PreviewTextView>& view)
     : _view(view)
     , _window(ObjectRef<GtkWidget>::retain(gtk_scrolled_window_new()))
     , _buffer(ObjectRef<GtkSourceBuffer>::adopt(gtk_source_buffer_new(nullptr)))
@@ -72,13 +72,13 @@ TextNative::TextNative(const std::shared_ptr<PreviewTextView>& view)
     build();
 }
 
-TextNative::~TextNative()
+TextPeer::~TextPeer()
 {
     if (_inserting != 0)
         g_source_remove(_inserting);
 }
 
-void TextNative::build()
+void TextPeer::build()
 {
     gtk_source_buffer_set_highlight_matching_brackets(_buffer.get(), FALSE);
     gtk_text_buffer_set_enable_undo(GTK_TEXT_BUFFER(_buffer.get()), FALSE);
@@ -100,7 +100,7 @@ void TextNative::build()
     gtk_widget_set_focusable(_window.get(), FALSE);
 }
 
-void TextNative::start()
+void TextPeer::start()
 {
     addShortcuts(widget(), _view);
     addGestures();
@@ -113,7 +113,7 @@ void TextNative::start()
     previewQueryDidChange();
 }
 
-void TextNative::addGestures()
+void TextPeer::addGestures()
 {
     auto* pinch = gtk_gesture_zoom_new();
     gtk_event_controller_set_propagation_phase(GTK_EVENT_CONTROLLER(pinch), GTK_PHASE_CAPTURE);
@@ -139,13 +139,13 @@ void TextNative::addGestures()
         }));
 }
 
-void TextNative::zoomBy(double factor)
+void TextPeer::zoomBy(double factor)
 {
     if (const auto view = _view.lock())
         view->setZoom(view->zoom() * factor);
 }
 
-void TextNative::followTheme()
+void TextPeer::followTheme()
 {
     const bool isDark = adw_style_manager_get_dark(adw_style_manager_get_default());
     auto* schemes = gtk_source_style_scheme_manager_get_default();
@@ -153,7 +153,7 @@ void TextNative::followTheme()
         gtk_source_style_scheme_manager_get_scheme(schemes, isDark ? "Adwaita-dark" : "Adwaita"));
 }
 
-void TextNative::previewContentDidChange()
+void TextPeer::previewContentDidChange()
 {
     const auto view = _view.lock();
     if (!view)
@@ -173,10 +173,10 @@ void TextNative::previewContentDidChange()
     }
 }
 
-void TextNative::findLanguage()
+void TextPeer::findLanguage()
 {
     SourceLanguages::guess(
-        _fileName, platform::weakly(this, [name = _fileName](TextNative& self, const auto& language) {
+        _fileName, platform::weakly(this, [name = _fileName](TextPeer& self, const auto& language) {
             if (self._fileName != name)
                 return;
             self._language = language;
@@ -185,7 +185,7 @@ void TextNative::findLanguage()
         }));
 }
 
-void TextNative::replaceText(const std::string& text)
+void TextPeer::replaceText(const std::string& text)
 {
     auto* buffer = GTK_TEXT_BUFFER(_buffer.get());
     if (_inserting != 0) {
@@ -208,7 +208,7 @@ void TextNative::replaceText(const std::string& text)
     insertPiece();
 }
 
-void TextNative::insertPiece()
+void TextPeer::insertPiece()
 {
     auto* buffer = GTK_TEXT_BUFFER(_buffer.get());
     auto end = std::min(_inserted + pieceBytes, _insertEnd);
@@ -232,14 +232,14 @@ void TextNative::insertPiece()
     if (_inserting == 0)
         _inserting = g_idle_add(
             [](gpointer data) -> gboolean {
-                auto* self = static_cast<TextNative*>(data);
+                auto* self = static_cast<TextPeer*>(data);
                 self->insertPiece();
                 return self->_inserting != 0 ? G_SOURCE_CONTINUE : G_SOURCE_REMOVE;
             },
             this);
 }
 
-void TextNative::finishText()
+void TextPeer::finishText()
 {
     // The colours are set when the whole text is there, because colouring every piece again would cost more
     // than inserting it.
@@ -248,7 +248,7 @@ void TextNative::finishText()
     publishSearch();
 }
 
-void TextNative::previewZoomDidChange()
+void TextPeer::previewZoomDidChange()
 {
     const auto view = _view.lock();
     if (!view)
@@ -260,7 +260,7 @@ void TextNative::previewZoomDidChange()
     gtk_css_provider_load_from_data(_style.get(), css, -1);
 }
 
-void TextNative::previewQueryDidChange()
+void TextPeer::previewQueryDidChange()
 {
     const auto view = _view.lock();
     if (!view)
@@ -285,7 +285,7 @@ void TextNative::previewQueryDidChange()
     searchFrom(place, MatchStep::Next);
 }
 
-void TextNative::previewShouldShowMatch(MatchStep step)
+void TextPeer::previewShouldShowMatch(MatchStep step)
 {
     if (!_search)
         return;
@@ -294,15 +294,15 @@ void TextNative::previewShouldShowMatch(MatchStep step)
     searchFrom(step == MatchStep::Next ? end : start, step);
 }
 
-void TextNative::searchFrom(const GtkTextIter& place, MatchStep step)
+void TextPeer::searchFrom(const GtkTextIter& place, MatchStep step)
 {
     struct Request {
-        std::weak_ptr<PreviewNative> self;
+        std::weak_ptr<PreviewPeer> self;
         MatchStep step;
     };
     const auto answer = [](GObject*, GAsyncResult* result, gpointer data) {
         const std::unique_ptr<Request> request(static_cast<Request*>(data));
-        if (const auto self = std::static_pointer_cast<TextNative>(request->self.lock()))
+        if (const auto self = std::static_pointer_cast<TextPeer>(request->self.lock()))
             self->matched(result, request->step);
     };
     auto request = std::make_unique<Request>(Request{weak_from_this(), step});
@@ -312,7 +312,7 @@ void TextNative::searchFrom(const GtkTextIter& place, MatchStep step)
         gtk_source_search_context_backward_async(_search.get(), &place, nullptr, answer, request.release());
 }
 
-void TextNative::matched(GAsyncResult* result, MatchStep step)
+void TextPeer::matched(GAsyncResult* result, MatchStep step)
 {
     GtkTextIter start, end;
     const auto finish = step == MatchStep::Next ? gtk_source_search_context_forward_finish
@@ -330,7 +330,7 @@ void TextNative::matched(GAsyncResult* result, MatchStep step)
 }
 
 /// Marks the current match, so that it stands out among the others even while the search field has the focus.
-void TextNative::markMatch(const GtkTextIter& start, const GtkTextIter& end)
+void TextPeer::markMatch(const GtkTextIter& start, const GtkTextIter& end)
 {
     unmarkMatch();
     auto* buffer = GTK_TEXT_BUFFER(_buffer.get());
@@ -339,14 +339,14 @@ void TextNative::markMatch(const GtkTextIter& start, const GtkTextIter& end)
     gtk_text_buffer_apply_tag(buffer, _marked, &start, &end);
 }
 
-void TextNative::unmarkMatch()
+void TextPeer::unmarkMatch()
 {
     GtkTextIter start, end;
     gtk_text_buffer_get_bounds(GTK_TEXT_BUFFER(_buffer.get()), &start, &end);
     gtk_text_buffer_remove_tag(GTK_TEXT_BUFFER(_buffer.get()), _marked, &start, &end);
 }
 
-void TextNative::publishSearch()
+void TextPeer::publishSearch()
 {
     const auto view = _view.lock();
     if (!view || !_search)
@@ -359,7 +359,7 @@ void TextNative::publishSearch()
         static_cast<std::size_t>(std::max(position, 0)), count >= 0 && _inserting == 0});
 }
 
-void TextNative::previewShouldTakeFocus()
+void TextPeer::previewShouldTakeFocus()
 {
     gtk_widget_grab_focus(_text);
 }
