@@ -21,7 +21,7 @@
 #include "screens/preview/PreviewSearchBar.h"
 #include "screens/preview/PreviewSummaryView.h"
 #include "screens/preview/PreviewToolbar.h"
-#include "screens/preview/PreviewViews.h"
+#include "screens/preview/PreviewViewChoice.h"
 
 #include <algorithm>
 #include <chrono>

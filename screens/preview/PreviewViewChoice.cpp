@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "screens/preview/PreviewViews.h"
+#include "screens/preview/PreviewViewChoice.h"
 
 #include "screens/preview/PreviewMediaView.h"
 #include "screens/preview/PreviewPagesView.h"
