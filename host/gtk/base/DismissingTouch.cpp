@@ -3,7 +3,7 @@
 
 #include "host/gtk/base/DismissingTouch.h"
 
-#include "host/gtk/base/Signal.h"
+#include "host/gtk/base/SignalConnection.h"
 
 #include <memory>
 

@@ -4,7 +4,7 @@
 #pragma once
 
 #include "host/gtk/base/ObjectRef.h"
-#include "host/gtk/base/Signal.h"
+#include "host/gtk/base/SignalConnection.h"
 
 #include <gtk/gtk.h>
 

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "host/gtk/base/Signal.h"
+#include "host/gtk/base/SignalConnection.h"
 #include "platform/Geometry.h"
 
 #include <gtk/gtk.h>

@@ -6,7 +6,7 @@
 #include "host/gtk/base/DismissingTouch.h"
 #include "host/gtk/base/ImagePaint.h"
 #include "host/gtk/base/ObjectRef.h"
-#include "host/gtk/base/Signal.h"
+#include "host/gtk/base/SignalConnection.h"
 
 #include <memory>
 

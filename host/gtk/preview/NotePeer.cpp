@@ -3,7 +3,7 @@
 
 #include "host/gtk/preview/NotePeer.h"
 
-#include "host/gtk/base/Signal.h"
+#include "host/gtk/base/SignalConnection.h"
 #include "platform/Weakly.h"
 #include "screens/preview/NoteView.h"
 

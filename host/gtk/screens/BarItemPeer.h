@@ -4,7 +4,7 @@
 #pragma once
 
 #include "host/gtk/base/PeerContext.h"
-#include "host/gtk/base/Signal.h"
+#include "host/gtk/base/SignalConnection.h"
 #include "kit/controllers/BarButtonItem.h"
 
 #include <memory>

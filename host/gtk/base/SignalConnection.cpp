@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "host/gtk/base/Signal.h"
+#include "host/gtk/base/SignalConnection.h"
 
 namespace host::gtk {
 
