@@ -10,6 +10,7 @@
 
 #include <algorithm>
 #include <cerrno>
+#include <cstring>
 #include <iterator>
 #include <memory>
 
@@ -105,6 +106,13 @@ Error systemError(int errorNumber, std::string_view path, const std::optional<st
     if (const auto code = fileErrorCode(errorNumber))
         return Error(*code, std::move(info));
     return Error(platform::errorDomain::system, errorNumber, std::move(info));
+}
+
+std::string logText(const SystemError& failure)
+{
+    const char* name = ::strerrorname_np(failure.number());
+    const std::string text = name ? name : std::to_string(failure.number());
+    return failure.about().empty() ? text : text + " (" + failure.about() + ')';
 }
 
 } // namespace host::system

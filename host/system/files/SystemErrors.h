@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "host/system/files/SystemError.h"
 #include "platform/Error.h"
 
 #include <optional>
@@ -17,6 +18,14 @@ namespace host::system {
 /// move when there is one, and a sentence for the user that names the item.
 platform::Error systemError(
     int errorNumber, std::string_view path, const std::optional<std::string>& destination = std::nullopt);
+inline platform::Error systemError(const SystemError& failure, std::string_view path,
+    const std::optional<std::string>& destination = std::nullopt)
+{
+    return systemError(failure.number(), path, destination);
+}
+
+/// A failure as a log line has it: the name of its errno and what it was about.
+std::string logText(const SystemError& failure);
 
 /// The last name of a path as text for people: bytes that are no UTF-8 become replacement characters.
 std::string displayName(std::string_view path);
