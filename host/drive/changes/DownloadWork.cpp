@@ -132,9 +132,7 @@ std::optional<Error> bringHere(const DriveLayout& layout, CloudStore& store, con
     if (failure == 0)
         return std::nullopt;
     // What is missing may be the promise or what it stands for.
-    struct stat found;
-    std::string name;
-    if (failure == ENOENT && item->entry.find(name, found) == 0)
+    if (failure == ENOENT && item->entry.find())
         return missingContent(path);
     return itemError(failure, path);
 }

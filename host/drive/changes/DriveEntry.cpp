@@ -19,6 +19,8 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
+using host::system::SystemResult;
 using platform::ItemVersion;
 using platform::Result;
 
@@ -40,9 +42,9 @@ Result<DriveEntry> DriveEntry::open(const DriveLayout& layout, const std::string
     return DriveEntry{std::move(folder), std::move(name), path};
 }
 
-int DriveEntry::status(struct stat& result) const
+SystemResult<struct stat> DriveEntry::status() const
 {
-    return ::fstatat(folder.get(), name.c_str(), &result, AT_SYMLINK_NOFOLLOW) == 0 ? 0 : errno;
+    return statusAt(folder, name);
 }
 
 std::string DriveEntry::promiseName() const
@@ -50,14 +52,25 @@ std::string DriveEntry::promiseName() const
     return PromiseRecord::pathFor(name);
 }
 
-int DriveEntry::find(std::string& physicalName, struct stat& result) const
+SystemResult<DriveEntry::Found> DriveEntry::find() const
 {
-    physicalName = name;
-    const int failure = status(result);
-    if (failure != ENOENT)
-        return failure;
-    physicalName = promiseName();
-    return ::fstatat(folder.get(), physicalName.c_str(), &result, AT_SYMLINK_NOFOLLOW) == 0 ? 0 : failure;
+    const auto own = status();
+    if (own)
+        return Found{name, *own};
+    if (!own.error.is(ENOENT))
+        return own.error;
+    auto promise = promiseName();
+    if (const auto promised = statusAt(folder, promise))
+        return Found{std::move(promise), *promised};
+    return own.error;
+}
+
+SystemError DriveEntry::checkIsFree() const
+{
+    const auto found = find();
+    if (found)
+        return {EEXIST, path};
+    return found.error.is(ENOENT) ? SystemError() : found.error;
 }
 
 Result<LocatedItem> LocatedItem::locate(const DriveLayout& layout, const std::string& path)
@@ -65,10 +78,10 @@ Result<LocatedItem> LocatedItem::locate(const DriveLayout& layout, const std::st
     auto entry = DriveEntry::open(layout, path);
     if (!entry)
         return *entry.error;
-    LocatedItem item{std::move(*entry.value), {}, {}};
-    if (const int failure = item.entry.find(item.name, item.found); failure != 0)
-        return itemError(failure, path);
-    return item;
+    auto found = entry.value->find();
+    if (!found)
+        return itemError(found.error, path);
+    return LocatedItem{std::move(*entry.value), std::move(found->name), found->status};
 }
 
 bool isSameContent(const ItemVersion& a, const ItemVersion& b)
@@ -78,25 +91,36 @@ bool isSameContent(const ItemVersion& a, const ItemVersion& b)
     return a == renamed;
 }
 
-int renameEntry(
+SystemResult<struct stat> statusAt(const FileDescriptor& folder, const std::string& name)
+{
+    struct stat found;
+    if (::fstatat(folder.get(), name.c_str(), &found, AT_SYMLINK_NOFOLLOW) != 0)
+        return SystemError::last(name);
+    return found;
+}
+
+SystemError renameEntry(
     const FileDescriptor& from, const std::string& name, const FileDescriptor& to, const std::string& newName)
 {
     const int done = ::renameat2(from.get(), name.c_str(), to.get(), newName.c_str(), RENAME_NOREPLACE);
-    return done == 0 ? 0 : errno;
+    return SystemError::unless(done == 0, name);
 }
 
-int syncFolder(const FileDescriptor& folder)
+SystemError syncFolder(const FileDescriptor& folder)
 {
     // A descriptor that only names a folder cannot be synced.
     const FileDescriptor readable(::openat(folder.get(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-    return readable && ::fsync(readable.get()) == 0 ? 0 : errno;
+    return SystemError::unless(readable && ::fsync(readable.get()) == 0);
 }
 
-FileDescriptor openOwnFolder(const std::string& path)
+SystemResult<FileDescriptor> openOwnFolder(const std::string& path)
 {
     if (::mkdir(path.c_str(), S_IRWXU) != 0 && errno != EEXIST)
-        return {};
-    return FileDescriptor(::open(path.c_str(), O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
+        return SystemError::last(path);
+    FileDescriptor folder(::open(path.c_str(), O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
+    if (!folder)
+        return SystemError::last(path);
+    return folder;
 }
 
 std::string uniqueName(const char* prefix)

@@ -6,6 +6,7 @@
 #include "host/drive/records/DriveLayout.h"
 #include "host/system/files/FileDescriptor.h"
 #include "host/system/files/FileVersion.h"
+#include "host/system/files/SystemError.h"
 #include "platform/FileSystem.h"
 
 #include <sys/stat.h>
@@ -25,13 +26,20 @@ struct DriveEntry {
     /// path that lies elsewhere or is the area itself, else why the folder cannot be had.
     static platform::Result<DriveEntry> open(const DriveLayout& layout, const std::string& path);
 
-    /// What the name is now, a link not followed; answers 0 or the errno.
-    int status(struct stat& result) const;
+    /// What the name is now, a link not followed.
+    host::system::SystemResult<struct stat> status() const;
     /// The same entry's promise.
     std::string promiseName() const;
-    /// The name on disk that stands for the item, the item's own or its promise's, and what it is now.
-    /// Answers 0 or the errno.
-    int find(std::string& physicalName, struct stat& result) const;
+    /// A name on disk and what it is.
+    struct Found {
+        std::string name;
+        struct stat status;
+    };
+    /// The name on disk that stands for the item, the item's own or its promise's, and what it is now. ENOENT
+    /// when there is neither.
+    host::system::SystemResult<Found> find() const;
+    /// EEXIST when an item or a promise has the name already.
+    host::system::SystemError checkIsFree() const;
 };
 
 /// An item that was found: the name on disk that stands for it, and what that was.
@@ -49,14 +57,16 @@ using host::system::versionOf;
 /// Whether both are one item of one content; a rename in between changes no more than the time of change.
 bool isSameContent(const platform::ItemVersion& a, const platform::ItemVersion& b);
 
-/// Renames without replacing anything; answers 0 or the errno (EEXIST).
-int renameEntry(const host::system::FileDescriptor& from, const std::string& name,
+/// What a name in an open folder is, a link not followed.
+host::system::SystemResult<struct stat> statusAt(
+    const host::system::FileDescriptor& folder, const std::string& name);
+/// Renames without replacing anything (EEXIST).
+host::system::SystemError renameEntry(const host::system::FileDescriptor& from, const std::string& name,
     const host::system::FileDescriptor& to, const std::string& newName);
-/// Brings a folder's names to the disk; answers 0 or the errno.
-int syncFolder(const host::system::FileDescriptor& folder);
-/// Opens a folder of the drive's own, which is made when it is missing and which the user alone may enter. On
-/// failure errno tells why.
-host::system::FileDescriptor openOwnFolder(const std::string& path);
+/// Brings a folder's names to the disk.
+host::system::SystemError syncFolder(const host::system::FileDescriptor& folder);
+/// Opens a folder of the drive's own, which is made when it is missing and which the user alone may enter.
+host::system::SystemResult<host::system::FileDescriptor> openOwnFolder(const std::string& path);
 /// A name that nothing has yet in any folder: a prefix, the process, the time, a number.
 std::string uniqueName(const char* prefix);
 /// Whether the process that made such a name is known to be gone.

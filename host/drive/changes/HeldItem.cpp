@@ -57,10 +57,13 @@ int HeldItem::take(const DriveLayout& layout, const DriveEntry& entry, const std
     std::optional<HeldItem>& held, const std::string& copy)
 {
     HeldItem item;
-    item._aside = openOwnFolder(layout.held());
+    auto aside = openOwnFolder(layout.held());
     item._origin = FileDescriptor(::fcntl(entry.folder.get(), F_DUPFD_CLOEXEC, 0));
-    if (!item._aside || !item._origin)
+    if (!aside)
+        return aside.error;
+    if (!item._origin)
         return errno;
+    item._aside = std::move(*aside);
     item._isAside = isOnOneFileSystem(item._aside, item._origin);
     item._originName = name;
     item._path = entry.path;

@@ -15,6 +15,7 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
 using platform::ItemVersion;
 
 namespace {
@@ -23,6 +24,15 @@ bool isPlainName(const std::string& name)
 {
     return !name.empty() && name != "." && name != ".."
         && name.find_first_of(std::string_view("/\0", 2)) == std::string::npos;
+}
+
+/// ECANCELED when what was moved into the store is another version by now.
+SystemError checkStored(const FileDescriptor& folder, const std::string& content, const ItemVersion& version)
+{
+    const auto stored = statusAt(folder, content);
+    if (!stored)
+        return stored.error;
+    return isSameContent(version, versionOf(*stored)) ? SystemError() : SystemError(ECANCELED, content);
 }
 
 } // namespace
@@ -65,18 +75,15 @@ int LocalCloudStore::fetch(const std::string& content, const FileDescriptor& int
 int LocalCloudStore::store(const DriveEntry& document, const ItemVersion& version, const std::string& content)
 {
     const auto folder = openOwnFolder(_layout.cloud());
-    struct stat moved;
     if (!folder)
-        return errno;
-    if (const int failure = renameEntry(document.folder, document.name, folder, content); failure != 0)
-        return failure;
-    int failure = ::fstatat(folder.get(), content.c_str(), &moved, AT_SYMLINK_NOFOLLOW) == 0 ? 0 : errno;
-    if (failure == 0 && !isSameContent(version, versionOf(moved)))
-        failure = ECANCELED;
-    if (failure == 0)
-        failure = syncFolder(folder);
-    if (failure != 0)
-        renameEntry(folder, content, document.folder, document.name);
+        return folder.error;
+    TRW_TRY(renameEntry(document.folder, document.name, *folder, content));
+    auto failure = checkStored(*folder, content, version);
+    if (!failure)
+        failure = syncFolder(*folder);
+    // Where it cannot come back to its name it stays a content.
+    if (failure)
+        static_cast<void>(renameEntry(*folder, content, document.folder, document.name));
     return failure;
 }
 
@@ -93,7 +100,9 @@ int LocalCloudStore::move(const std::string& content, const std::string& newCont
     if (!isPlainName(content) || !isPlainName(newContent))
         return ENOENT;
     const auto folder = openFolder();
-    return folder ? renameEntry(folder, content, folder, newContent) : errno;
+    if (!folder)
+        return errno;
+    return renameEntry(folder, content, folder, newContent);
 }
 
 bool LocalCloudStore::holdsOtherThan(const std::string& content, const FileDescriptor& document)

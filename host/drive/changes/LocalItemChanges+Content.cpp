@@ -161,13 +161,10 @@ std::optional<Error> LocalItemChanges::addDocument(
     const auto entry = DriveEntry::open(_layout, path);
     if (!entry)
         return entry.error;
-    std::string name;
-    struct stat found;
-    int failure = entry->find(name, found);
-    if (failure != ENOENT)
-        return itemError(failure == 0 ? EEXIST : failure, path);
+    if (const auto failure = entry->checkIsFree())
+        return itemError(failure, path);
     std::optional<NewFile> file;
-    failure = NewFile::create(_layout, *entry, file);
+    int failure = NewFile::create(_layout, *entry, file);
     if (failure == 0)
         failure = file->write(content);
     // It is a document of its own: the other one keeps the identifier.

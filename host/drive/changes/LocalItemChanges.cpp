@@ -20,21 +20,13 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
 using host::system::systemError;
 using platform::Error;
 using platform::FileErrorCode;
 using platform::ItemVersion;
 
 namespace {
-
-/// Whether an item or a promise has the name already; answers 0 when none has, EEXIST, or another errno.
-int checkIsFree(const DriveEntry& entry)
-{
-    std::string name;
-    struct stat found;
-    const int failure = entry.find(name, found);
-    return failure == ENOENT ? 0 : failure == 0 ? EEXIST : failure;
-}
 
 PromiseRecord promiseFor(const ItemFacts& facts, const std::string& content)
 {
@@ -78,17 +70,18 @@ std::optional<Error> makeFolder(
     auto entry = DriveEntry::open(layout, path);
     if (!entry)
         return entry.error;
-    struct stat found;
-    int failure = checkIsFree(*entry);
-    if (failure == 0)
-        failure = ::mkdirat(entry->folder.get(), entry->name.c_str(), 0777) == 0 ? 0 : errno;
-    if (failure == EEXIST && entry->status(found) == 0 && S_ISDIR(found.st_mode))
-        return std::nullopt;
-    if (failure == 0) {
+    auto failure = entry->checkIsFree();
+    if (!failure)
+        failure = SystemError::unless(::mkdirat(entry->folder.get(), entry->name.c_str(), 0777) == 0, path);
+    if (failure.is(EEXIST)) {
+        if (const auto found = entry->status(); found && S_ISDIR(found->st_mode))
+            return std::nullopt;
+    }
+    if (!failure) {
         made.push_back(std::move(*entry.value));
         failure = syncFolder(made.back().folder);
     }
-    return failure == 0 ? std::nullopt : std::optional(itemError(failure, path));
+    return failure ? std::optional(itemError(failure, path)) : std::nullopt;
 }
 
 Error intoItself(const std::string& from, const std::string& to)
@@ -165,7 +158,7 @@ std::optional<Error> LocalItemChanges::moveItem(const std::string& from, const s
         return source ? target.error : source.error;
     if (to.starts_with(from + '/'))
         return intoItself(from, to);
-    if (const int failure = checkIsFree(*target); failure != 0)
+    if (const auto failure = target->checkIsFree())
         return systemError(failure, from, to);
     if (!source->isPromise())
         dropRedundantPromise(source->entry, *_store);
@@ -192,7 +185,7 @@ int LocalItemChanges::moveWithin(
         failure = syncFolder(source.entry.folder);
     // A move that might not outlive a power cut is none.
     if (failure != 0)
-        renameEntry(target.folder, newName, source.entry.folder, source.name);
+        static_cast<void>(renameEntry(target.folder, newName, source.entry.folder, source.name));
     return failure;
 }
 
@@ -279,8 +272,7 @@ int LocalItemChanges::replaceByPromise(const LocatedItem& item)
     if (failure != 0)
         return failure;
     failure = _store->store(entry, versionOf(item.found), content);
-    struct stat found;
-    if (failure != 0 && entry.status(found) == 0)
+    if (failure != 0 && entry.status())
         dropRedundantPromise(entry, *_store);
     // The document's old name needs no sync: come back after a power cut it would hide its promise, no more.
     return failure;

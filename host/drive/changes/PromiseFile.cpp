@@ -39,8 +39,7 @@ int contentOfPromise(const FileDescriptor& folder, const std::string& promiseNam
 
 void dropRedundantPromise(const DriveEntry& entry, CloudStore& store)
 {
-    struct stat found;
-    if (entry.status(found) != 0)
+    if (!entry.status())
         return;
     const auto promise = readPromise(entry);
     if (!promise)

@@ -21,6 +21,7 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
 
 namespace {
 
@@ -29,8 +30,7 @@ constexpr const char* originMark = "user.tarrow.origin";
 
 bool isThere(const DriveEntry& entry)
 {
-    struct stat found;
-    return entry.status(found) == 0;
+    return static_cast<bool>(entry.status());
 }
 
 std::string lastName(const std::string& path)
@@ -66,8 +66,8 @@ platform::Result<DriveEntry> Recovery::entryAt(const std::string& path) const
     if (path != _layout.held() + '/' + name)
         return DriveEntry::open(_layout, path);
     auto folder = openOwnFolder(_layout.held());
-    return folder ? platform::Result<DriveEntry>(DriveEntry{std::move(folder), name, path})
-                  : itemError(errno, path);
+    return folder ? platform::Result<DriveEntry>(DriveEntry{std::move(*folder), name, path})
+                  : itemError(folder.error, path);
 }
 
 bool Recovery::settle(const WorkRecord::Places& places)
@@ -135,10 +135,11 @@ bool Recovery::discard(const DriveEntry& entry, bool contentsToo)
 bool Recovery::putBack(const DriveEntry& held, const std::string& item)
 {
     const auto origin = DriveEntry::open(_layout, item);
-    const int failure = origin ? renameEntry(held.folder, held.name, origin->folder, origin->name) : ENOENT;
-    if (failure == 0)
-        return syncFolder(origin->folder) == 0;
-    return (failure == EEXIST || failure == ENOENT) && moveToTrash(held, item);
+    const auto failure = origin ? renameEntry(held.folder, held.name, origin->folder, origin->name)
+                                : SystemError(ENOENT, item);
+    if (!failure)
+        return !syncFolder(origin->folder);
+    return (failure.is(EEXIST) || failure.is(ENOENT)) && moveToTrash(held, item);
 }
 
 bool Recovery::moveToTrash(const DriveEntry& held, const std::string& item)
@@ -149,18 +150,18 @@ bool Recovery::moveToTrash(const DriveEntry& held, const std::string& item)
     const auto path = descriptorPath(held.folder) + '/' + held.name;
     ::lsetxattr(path.c_str(), originMark, item.data(), item.size(), 0);
     const auto document = PromiseRecord::itemPathFor(lastName(item));
-    int failure = trash ? EEXIST : errno;
-    for (int number = 1; failure == EEXIST && number < mostOfOneName; ++number) {
+    auto failure = trash ? SystemError(EEXIST) : trash.error;
+    for (int number = 1; failure.is(EEXIST) && number < mostOfOneName; ++number) {
         auto name = document.value_or(lastName(item));
         if (number > 1)
             name += ' ' + std::to_string(number);
-        failure = renameEntry(held.folder, held.name, trash, document ? PromiseRecord::pathFor(name) : name);
+        failure = renameEntry(held.folder, held.name, *trash, document ? PromiseRecord::pathFor(name) : name);
     }
-    if (failure == 0)
+    if (!failure)
         op.warning("Cannot put back %@: it is in the trash now", item);
     else
         op.error("Cannot put back %@, kept as %@: %@", item, held.path, itemError(failure, item));
-    return failure == 0;
+    return !failure;
 }
 
 void Recovery::settleStrays()

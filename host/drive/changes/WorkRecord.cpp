@@ -67,8 +67,8 @@ WorkRecord::~WorkRecord()
 
 int WorkRecord::write(const DriveLayout& layout, const Places& places, std::optional<WorkRecord>& record)
 {
-    if (!openOwnFolder(layout.held()))
-        return errno;
+    if (const auto folder = openOwnFolder(layout.held()); !folder)
+        return folder.error;
     const auto isFull = [] { return errno == ENOSPC || errno == EDQUOT; };
     const auto text = textOf(places);
     WorkRecord fresh;

@@ -26,7 +26,7 @@ namespace {
 /// nothing can be written to the index either.
 FileDescriptor lockGiving(const DriveLayout& layout)
 {
-    openOwnFolder(layout.locks());
+    static_cast<void>(openOwnFolder(layout.locks()));
     FileDescriptor file(
         ::open(layout.identification().c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600));
     int result = 0;

@@ -4,6 +4,7 @@
 #pragma once
 
 #include "host/system/files/FileDescriptor.h"
+#include "host/system/files/SystemError.h"
 #include "platform/CloudItems.h"
 #include "platform/Error.h"
 
@@ -23,6 +24,10 @@ platform::Result<std::string> readSmallFile(
 /// The error of a system call on an item of the drive: as host::system::systemError(), but an item below
 /// something that is no folder is missing, too.
 platform::Error itemError(int errorNumber, const std::string& path);
+inline platform::Error itemError(const host::system::SystemError& failure, const std::string& path)
+{
+    return itemError(failure.number(), path);
+}
 
 /// Codes of errorDomain::cloud.
 enum class CloudErrorCode : int {
