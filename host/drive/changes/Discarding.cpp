@@ -15,29 +15,31 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
 
 namespace {
 
 /// Root may write anywhere and still cannot remove what is marked so.
-int checkMarks(const FileDescriptor& folder, const char* name, int flags)
+SystemError checkMarks(const FileDescriptor& folder, const char* name, int flags)
 {
     struct statx found;
     if (::statx(folder.get(), name, flags | AT_NO_AUTOMOUNT, STATX_TYPE, &found) != 0)
-        return errno;
-    return found.stx_attributes & (STATX_ATTR_IMMUTABLE | STATX_ATTR_APPEND) ? EPERM : 0;
+        return SystemError::last(name);
+    const bool isMarked = found.stx_attributes & (STATX_ATTR_IMMUTABLE | STATX_ATTR_APPEND);
+    return isMarked ? SystemError(EPERM, name) : SystemError();
 }
 
 class RemovableCheck : public TreeVisitor {
 public:
-    int visitItem(const FileDescriptor& folder, const std::string& name, const struct stat&) override
+    SystemError visitItem(const FileDescriptor& folder, const std::string& name, const struct stat&) override
     {
         return checkMarks(folder, name.c_str(), AT_SYMLINK_NOFOLLOW);
     }
-    int enterFolder(
+    SystemError enterFolder(
         const FileDescriptor& folder, const struct stat&, const std::vector<std::string>& names) override
     {
         if (!names.empty() && ::faccessat(folder.get(), ".", W_OK | X_OK, AT_EACCESS) != 0)
-            return errno;
+            return SystemError::last();
         return checkMarks(folder, "", AT_EMPTY_PATH);
     }
 };
@@ -48,57 +50,60 @@ public:
         : _store(store)
     {
     }
-    int visitItem(const FileDescriptor& folder, const std::string& name, const struct stat& found) override
+    SystemError visitItem(
+        const FileDescriptor& folder, const std::string& name, const struct stat& found) override
     {
         if (_store && S_ISREG(found.st_mode) && PromiseRecord::itemPathFor(name)) {
             std::string content;
-            int failed = contentOfPromise(folder, name, content);
-            if (failed == 0 && !content.empty())
+            SystemError failed = contentOfPromise(folder, name, content);
+            if (!failed && !content.empty())
                 failed = _store->remove(content);
-            if (failed != 0)
+            if (failed)
                 return note(failed);
             hasBegun = hasBegun || !content.empty();
         }
-        return note(::unlinkat(folder.get(), name.c_str(), 0) == 0 || errno == ENOENT ? 0 : errno);
+        const bool isGone = ::unlinkat(folder.get(), name.c_str(), 0) == 0 || errno == ENOENT;
+        return note(SystemError::unless(isGone, name));
     }
-    int leaveFolder(const FileDescriptor& parent, const std::string& name) override
+    SystemError leaveFolder(const FileDescriptor& parent, const std::string& name) override
     {
-        const int failed = ::unlinkat(parent.get(), name.c_str(), AT_REMOVEDIR) == 0 ? 0 : errno;
+        auto failed = SystemError::unless(::unlinkat(parent.get(), name.c_str(), AT_REMOVEDIR) == 0, name);
         // Why a folder is not empty was noted before.
-        return note(failed == ENOTEMPTY && failure != 0 ? failure : failed);
+        return note(failed.is(ENOTEMPTY) && failure ? failure : failed);
     }
     bool hasBegun = false;
-    int failure = 0;
+    SystemError failure; ///< the first one
 
 private:
     /// Before anything is gone the first failure ends the walk; later ones are left behind.
-    int note(int failed)
+    SystemError note(const SystemError& failed)
     {
-        if (failed == 0)
+        if (!failed)
             hasBegun = true;
-        else if (failure == 0)
+        else if (!failure)
             failure = failed;
-        return hasBegun ? 0 : failed;
+        return hasBegun ? SystemError() : failed;
     }
     CloudStore* _store;
 };
 
 } // namespace
 
-int checkRemovable(const FileDescriptor& folder, const std::string& name)
+SystemError checkRemovable(const FileDescriptor& folder, const std::string& name)
 {
     RemovableCheck check;
     return walkTree(folder, name, check);
 }
 
-Discarded discardTree(const FileDescriptor& folder, const std::string& name, CloudStore* store, int& failure)
+Discarded discardTree(const FileDescriptor& folder, const std::string& name, CloudStore* store)
 {
+    using Part = Discarded::Part;
     Discard discard(store);
-    const int ended = walkTree(folder, name, discard);
-    failure = discard.failure != 0 ? discard.failure : ended;
-    if (failure == 0)
-        return Discarded::Everything;
-    return discard.hasBegun ? Discarded::Something : Discarded::Nothing;
+    const auto ended = walkTree(folder, name, discard);
+    auto failure = discard.failure ? discard.failure : ended;
+    if (!failure)
+        return {Part::Everything, {}};
+    return {discard.hasBegun ? Part::Something : Part::Nothing, std::move(failure)};
 }
 
 } // namespace host::drive

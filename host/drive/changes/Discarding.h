@@ -4,6 +4,7 @@
 #pragma once
 
 #include "host/system/files/FileDescriptor.h"
+#include "host/system/files/SystemError.h"
 
 #include <string>
 
@@ -11,16 +12,19 @@ namespace host::drive {
 
 class CloudStore;
 
-/// Whether an item could be removed with everything in it, as far as that can be told without trying: answers
-/// 0, EACCES or EPERM for what may not be removed, EBUSY for what is mounted in a folder, or another errno.
-int checkRemovable(const system::FileDescriptor& folder, const std::string& name);
+/// Whether an item could be removed with everything in it, as far as that can be told without trying. Errors:
+/// EACCES or EPERM for what may not be removed, EBUSY for what is mounted in a folder.
+system::SystemError checkRemovable(const system::FileDescriptor& folder, const std::string& name);
 
 /// How much of an item is gone.
-enum class Discarded { Nothing, Something, Everything };
+struct Discarded {
+    enum class Part { Nothing, Something, Everything };
+    Part part;
+    system::SystemError failure; ///< the first one; none when everything is gone
+};
 
 /// Removes an item with everything in it and, where a store is given, the contents behind its promises. It
-/// goes on after a failure, and answers how far it came and in `failure` the first errno.
-Discarded discardTree(
-    const system::FileDescriptor& folder, const std::string& name, CloudStore* store, int& failure);
+/// goes on after a failure once the first part is gone.
+Discarded discardTree(const system::FileDescriptor& folder, const std::string& name, CloudStore* store);
 
 } // namespace host::drive

@@ -6,6 +6,7 @@
 #include "host/drive/changes/Discarding.h"
 #include "host/drive/records/PromiseRecord.h"
 #include "host/drive/records/SmallFile.h"
+#include "host/system/files/SystemErrors.h"
 #include "platform/Log.h"
 
 #include <fcntl.h>
@@ -92,17 +93,18 @@ int HeldItem::decide(const char* prefix)
 int HeldItem::remove(CloudStore* store)
 {
     static constexpr platform::Operation op{"-[HeldItem remove]"};
-    int failure = checkRemovable(folder(), _name);
-    if (failure == 0)
-        failure = decide(store ? WorkRecord::gonePrefix : WorkRecord::movedPrefix);
-    const auto discarded = failure == 0 ? discardTree(folder(), _name, store, failure) : Discarded::Nothing;
-    if (discarded == Discarded::Nothing) {
+    Discarded discarded{Discarded::Part::Nothing, checkRemovable(folder(), _name)};
+    if (!discarded.failure)
+        discarded.failure = decide(store ? WorkRecord::gonePrefix : WorkRecord::movedPrefix);
+    if (!discarded.failure)
+        discarded = discardTree(folder(), _name, store);
+    if (discarded.part == Discarded::Part::Nothing) {
         putBack();
-        return failure;
+        return discarded.failure;
     }
     _isThere = false;
-    if (discarded == Discarded::Something) {
-        op.warning("Not all of %@ could be removed yet: %@", _path, itemError(failure, _path));
+    if (discarded.part == Discarded::Part::Something) {
+        op.warning("Not all of %@ could be removed yet: %@", _path, discarded.failure);
         _record->keep();
     }
     return 0;

@@ -22,6 +22,7 @@ namespace host::drive {
 using host::system::FileDescriptor;
 using host::system::SystemError;
 using host::system::systemError;
+using host::system::SystemResult;
 using platform::Error;
 using platform::FileErrorCode;
 using platform::ItemVersion;
@@ -56,6 +57,18 @@ bool holdsFolder(const TreeVersions& tree, const FileDescriptor& folder)
 {
     struct stat found;
     return ::fstat(folder.get(), &found) == 0 && tree.contains({found.st_dev, found.st_ino});
+}
+
+/// Copies an item beside where it is to lie and gives the whole copy its name; answers what was copied.
+SystemResult<TreeVersions> copyTo(const LocatedItem& source, const DriveEntry& target,
+    const std::string& temporary, const std::string& newName)
+{
+    TRW_TRY(SystemError(copyTree(source.entry.folder, source.name, target.folder, temporary)));
+    auto copied = readVersions(target.folder, temporary);
+    if (!copied)
+        return copied;
+    TRW_TRY(renameEntry(target.folder, temporary, target.folder, newName));
+    return copied;
 }
 
 Error changeError(int errorNumber, const std::string& path)
@@ -133,21 +146,23 @@ std::optional<Error> LocalItemChanges::removeItem(
     return failure == 0 ? std::nullopt : std::optional(changeError(failure, path));
 }
 
-int LocalItemChanges::removeLocated(const LocatedItem& item)
+SystemError LocalItemChanges::removeLocated(const LocatedItem& item)
 {
-    TreeVersions before, after;
-    if (const int failure = readVersions(item.entry.folder, item.name, before); failure != 0)
-        return failure;
+    const auto before = readVersions(item.entry.folder, item.name);
+    if (!before)
+        return before.error;
     std::optional<HeldItem> held;
-    int failure = HeldItem::take(_layout, item.entry, item.name, held);
-    if (failure == 0)
-        failure = readVersions(held->folder(), held->name(), after);
-    if (failure != 0)
-        return failure;
+    TRW_TRY(SystemError(HeldItem::take(_layout, item.entry, item.name, held)));
+    const auto after = readVersions(held->folder(), held->name());
+    if (!after)
+        return after.error;
     const auto version = versionOf(item.found);
-    const auto same = after.find({version.device, version.inode});
-    const bool isUnchanged = before == after && same != after.end() && isSameContent(version, same->second);
-    return isUnchanged ? held->remove(_store.get()) : changedMeanwhile;
+    const auto same = after->find({version.device, version.inode});
+    const bool isUnchanged =
+        *before == *after && same != after->end() && isSameContent(version, same->second);
+    if (!isUnchanged)
+        return SystemError(changedMeanwhile, item.name);
+    return held->remove(_store.get());
 }
 
 std::optional<Error> LocalItemChanges::moveItem(const std::string& from, const std::string& to)
@@ -189,60 +204,56 @@ int LocalItemChanges::moveWithin(
     return failure;
 }
 
-int LocalItemChanges::moveAcross(
+SystemError LocalItemChanges::moveAcross(
     const LocatedItem& source, const DriveEntry& target, const std::string& newName)
 {
-    TreeVersions before;
-    if (const int failure = readVersions(source.entry.folder, source.name, before); failure != 0)
-        return failure;
-    if (holdsFolder(before, target.folder))
-        return ownFolder;
+    const auto before = readVersions(source.entry.folder, source.name);
+    if (!before)
+        return before.error;
+    if (holdsFolder(*before, target.folder))
+        return SystemError(ownFolder, target.path);
     const auto temporary = uniqueName(WorkRecord::temporaryPrefix);
     const auto folder = target.path.substr(0, target.path.rfind('/') + 1);
     const auto item = source.entry.path.substr(0, source.entry.path.rfind('/') + 1) + source.name;
     std::optional<WorkRecord> record;
-    TreeVersions copied;
-    int failure = WorkRecord::write(_layout, {item, folder + temporary, folder + newName}, record);
-    if (failure == 0)
-        failure = copyTree(source.entry.folder, source.name, target.folder, temporary);
-    if (failure == 0)
-        failure = readVersions(target.folder, temporary, copied);
-    if (failure == 0)
-        failure = renameEntry(target.folder, temporary, target.folder, newName);
-    if (failure != 0) {
-        removeTree(target.folder, temporary);
-        return failure;
+    auto failure =
+        SystemError(WorkRecord::write(_layout, {item, folder + temporary, folder + newName}, record));
+    const auto copied =
+        failure ? SystemResult<TreeVersions>(failure) : copyTo(source, target, temporary, newName);
+    if (!copied) {
+        static_cast<void>(removeTree(target.folder, temporary));
+        return copied.error;
     }
     // From here on the copy is whole and has its name: the worst that can be is that both are there.
     failure = syncFolder(target.folder);
-    if (failure == 0)
-        failure = removeMoved(source, before, folder + newName);
-    if (failure != 0)
-        withdraw(target, newName, copied);
+    if (!failure)
+        failure = removeMoved(source, *before, folder + newName);
+    if (failure)
+        withdraw(target, newName, *copied);
     return failure;
 }
 
 void LocalItemChanges::withdraw(const DriveEntry& target, const std::string& name, const TreeVersions& copied)
 {
     // The original is there still. A copy that somebody has changed by now is more than a copy.
-    TreeVersions found;
     std::optional<HeldItem> held;
-    if (HeldItem::take(_layout, target, name, held) == 0
-        && readVersions(held->folder(), held->name(), found) == 0 && found == copied)
-        held->remove(nullptr);
+    if (HeldItem::take(_layout, target, name, held))
+        return;
+    if (const auto found = readVersions(held->folder(), held->name()); found && *found == copied)
+        static_cast<void>(held->remove(nullptr));
 }
 
-int LocalItemChanges::removeMoved(
+SystemError LocalItemChanges::removeMoved(
     const LocatedItem& source, const TreeVersions& before, const std::string& copy)
 {
-    TreeVersions after;
     std::optional<HeldItem> held;
-    int failure = HeldItem::take(_layout, source.entry, source.name, held, copy);
-    if (failure == 0)
-        failure = readVersions(held->folder(), held->name(), after);
-    if (failure == 0)
-        failure = before == after ? held->remove(nullptr) : changedMeanwhile;
-    return failure;
+    TRW_TRY(SystemError(HeldItem::take(_layout, source.entry, source.name, held, copy)));
+    const auto after = readVersions(held->folder(), held->name());
+    if (!after)
+        return after.error;
+    if (before != *after)
+        return SystemError(changedMeanwhile, source.name);
+    return held->remove(nullptr);
 }
 
 std::optional<Error> LocalItemChanges::evictItem(const std::string& path)

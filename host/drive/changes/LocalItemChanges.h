@@ -46,10 +46,12 @@ public:
     virtual std::optional<platform::Error> evictItem(const std::string& path);
 
 private:
-    int removeLocated(const LocatedItem& item);
+    system::SystemError removeLocated(const LocatedItem& item);
     int moveWithin(const LocatedItem& source, const DriveEntry& target, const std::string& newName);
-    int moveAcross(const LocatedItem& source, const DriveEntry& target, const std::string& newName);
-    int removeMoved(const LocatedItem& source, const TreeVersions& before, const std::string& copy);
+    system::SystemError moveAcross(
+        const LocatedItem& source, const DriveEntry& target, const std::string& newName);
+    system::SystemError removeMoved(
+        const LocatedItem& source, const TreeVersions& before, const std::string& copy);
     void withdraw(const DriveEntry& target, const std::string& name, const TreeVersions& copied);
     int replaceByPromise(const LocatedItem& item);
 

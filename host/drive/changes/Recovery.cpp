@@ -11,6 +11,7 @@
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/SmallFile.h"
 #include "host/system/files/DirectoryReader.h"
+#include "host/system/files/SystemErrors.h"
 #include "platform/Log.h"
 
 #include <fcntl.h>
@@ -80,13 +81,14 @@ bool Recovery::settleCopy(const WorkRecord::Places& places)
 {
     static constexpr platform::Operation op{"-[Recovery settleCopy:]"};
     const auto temporary = DriveEntry::open(_layout, places.working);
-    int failure = temporary ? removeTree(temporary->folder, temporary->name) : ENOENT;
-    if ((failure == 0 || failure == ENOENT) && !places.copy.empty())
+    auto failure =
+        temporary ? removeTree(temporary->folder, temporary->name) : SystemError(ENOENT, places.working);
+    if ((!failure || failure.is(ENOENT)) && !places.copy.empty())
         failure = finishMove(places);
     const auto document = DriveEntry::open(_layout, documentPath(places.item));
     if (document)
         dropRedundantPromise(*document, _store);
-    if (failure == 0 || failure == ENOENT)
+    if (!failure || failure.is(ENOENT))
         return true;
     op.warning("Cannot settle what was left of %@: %@", places.item, itemError(failure, places.item));
     return false;
@@ -125,11 +127,10 @@ bool Recovery::settleHeld(const WorkRecord::Places& places)
 bool Recovery::discard(const DriveEntry& entry, bool contentsToo)
 {
     static constexpr platform::Operation op{"-[Recovery discard:]"};
-    int failure = 0;
-    discardTree(entry.folder, entry.name, contentsToo ? &_store : nullptr, failure);
-    if (failure != 0)
-        op.warning("Cannot remove the rest of %@: %@", entry.path, itemError(failure, entry.path));
-    return failure == 0;
+    const auto failure = discardTree(entry.folder, entry.name, contentsToo ? &_store : nullptr).failure;
+    if (failure)
+        op.warning("Cannot remove the rest of %@: %@", entry.path, failure);
+    return !failure;
 }
 
 bool Recovery::putBack(const DriveEntry& held, const std::string& item)
@@ -167,10 +168,12 @@ bool Recovery::moveToTrash(const DriveEntry& held, const std::string& item)
 void Recovery::settleStrays()
 {
     const auto folder = system::openFolder(_layout.held());
-    std::vector<std::string> names;
-    if (!folder || readNames(folder, names) != 0)
+    if (!folder)
         return;
-    for (const auto& name : names) {
+    const auto names = readNames(folder);
+    if (!names)
+        return;
+    for (const auto& name : *names) {
         // On a full disk an item may be held without a record.
         const auto held = entryAt(_layout.held() + '/' + name);
         if (!held || WorkRecord::isRecorded(_layout, name) || !isProcessGone(name))

@@ -121,11 +121,16 @@ int copyFolder(const FileDescriptor& folder, const std::string& name, const File
     if (::mkdirat(target.get(), newName.c_str(), S_IRWXU) != 0)
         return errno;
     const auto to = openSubfolder(target, newName);
-    std::vector<std::string> names;
-    int failure = to ? readNames(from, names) : errno;
-    for (auto each = names.begin(); failure == 0 && each != names.end(); ++each)
-        failure = copyItem(from, *each, to, *each, level + 1);
-    return failure == 0 ? finish(from, to, status) : failure;
+    if (!to)
+        return errno;
+    const auto names = readNames(from);
+    if (!names)
+        return names.error;
+    for (const auto& each : *names) {
+        if (const int failure = copyItem(from, each, to, each, level + 1); failure != 0)
+            return failure;
+    }
+    return finish(from, to, status);
 }
 
 int copyItem(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
@@ -150,17 +155,23 @@ struct Pair {
     const std::string& otherName;
 };
 
+std::optional<std::vector<std::string>> sortedNames(const FileDescriptor& folder)
+{
+    auto names = readNames(folder);
+    if (names)
+        std::ranges::sort(*names);
+    return std::move(names.value);
+}
+
 bool isSameItem(const Pair& pair, int level);
 
 bool isSameFolder(const Pair& pair, int level)
 {
     const auto a = openSubfolder(pair.folder, pair.name), b = openSubfolder(pair.otherFolder, pair.otherName);
-    std::vector<std::string> names, others;
-    if (!a || !b || level >= mostLevels || readNames(a, names) != 0 || readNames(b, others) != 0)
+    if (!a || !b || level >= mostLevels)
         return false;
-    std::ranges::sort(names);
-    std::ranges::sort(others);
-    return names == others && std::ranges::all_of(names, [&](const std::string& name) {
+    const auto names = sortedNames(a), others = names ? sortedNames(b) : std::nullopt;
+    return others && *names == *others && std::ranges::all_of(*names, [&](const std::string& name) {
         return isSameItem({a, name, b, name}, level + 1);
     });
 }

@@ -17,6 +17,8 @@ namespace host::drive {
 using host::system::DirectoryReader;
 using host::system::FileDescriptor;
 using host::system::openFolderAt;
+using host::system::SystemError;
+using host::system::SystemResult;
 
 namespace {
 
@@ -27,13 +29,15 @@ public:
         : _visitor(visitor)
     {
     }
-    int run(const FileDescriptor& parent, const std::string& name)
+    SystemError run(const FileDescriptor& parent, const std::string& name)
     {
         _current = openSubfolder(parent, name);
-        int failure = _current ? enter() : errno;
-        while (failure == 0 && !_levels.empty())
-            failure = _levels.back().subfolders.empty() ? leave() : descend();
-        return failure != 0 ? failure : _visitor.leaveFolder(parent, name);
+        if (!_current)
+            return SystemError::last(name);
+        TRW_TRY(enter());
+        while (!_levels.empty())
+            TRW_TRY(_levels.back().subfolders.empty() ? leave() : descend());
+        return _visitor.leaveFolder(parent, name);
     }
 
 private:
@@ -44,52 +48,53 @@ private:
     };
 
     /// Visits what is no folder in the current one, and notes the others.
-    int enter()
+    SystemError enter()
     {
         struct stat self;
-        std::vector<std::string> names;
         if (::fstat(_current.get(), &self) != 0)
-            return errno;
-        int failure = readNames(_current, names);
-        if (failure == 0)
-            failure = _visitor.enterFolder(_current, self, names);
+            return SystemError::last();
+        auto names = readNames(_current);
+        if (!names)
+            return names.error;
+        TRW_TRY(_visitor.enterFolder(_current, self, *names));
         std::vector<std::string> subfolders;
-        for (auto each = names.begin(); failure == 0 && each != names.end(); ++each)
-            failure = visit(*each, subfolders);
+        for (auto& name : *names)
+            TRW_TRY(visit(name, subfolders));
         _levels.push_back({self.st_dev, self.st_ino, std::move(subfolders)});
-        return failure;
+        return {};
     }
-    int visit(std::string& name, std::vector<std::string>& subfolders)
+    SystemError visit(std::string& name, std::vector<std::string>& subfolders)
     {
-        struct stat found;
-        if (::fstatat(_current.get(), name.c_str(), &found, AT_SYMLINK_NOFOLLOW) != 0)
-            return errno == ENOENT ? 0 : errno;
-        if (!S_ISDIR(found.st_mode))
-            return _visitor.visitItem(_current, name, found);
+        const auto found = statusAt(_current, name);
+        if (!found)
+            return found.error.is(ENOENT) ? SystemError() : found.error;
+        if (!S_ISDIR(found->st_mode))
+            return _visitor.visitItem(_current, name, *found);
         subfolders.push_back(std::move(name));
-        return 0;
+        return {};
     }
-    int descend()
+    SystemError descend()
     {
-        auto below = openSubfolder(_current, _levels.back().subfolders.back());
+        const auto& name = _levels.back().subfolders.back();
+        auto below = openSubfolder(_current, name);
         if (!below)
-            return errno;
+            return SystemError::last(name);
         _current = std::move(below);
         return enter();
     }
-    int leave()
+    SystemError leave()
     {
         _levels.pop_back();
         if (_levels.empty())
-            return 0;
+            return {};
         auto above = openFolderAt(_current, "..");
         struct stat found;
         // Whoever moved the folder away took its contents along; its new parent is no business of ours.
         if (!above || ::fstat(above.get(), &found) != 0)
-            return errno;
+            return SystemError::last("..");
         auto& level = _levels.back();
         if (found.st_dev != level.device || found.st_ino != level.inode)
-            return ESTALE;
+            return {ESTALE, level.subfolders.back()};
         _current = std::move(above);
         const auto name = std::move(level.subfolders.back());
         level.subfolders.pop_back();
@@ -103,71 +108,74 @@ private:
 
 class Removal : public TreeVisitor {
 public:
-    int visitItem(const FileDescriptor& folder, const std::string& name, const struct stat&) override
+    SystemError visitItem(const FileDescriptor& folder, const std::string& name, const struct stat&) override
     {
-        return ::unlinkat(folder.get(), name.c_str(), 0) == 0 || errno == ENOENT ? 0 : errno;
+        return SystemError::unless(::unlinkat(folder.get(), name.c_str(), 0) == 0 || errno == ENOENT, name);
     }
-    int leaveFolder(const FileDescriptor& parent, const std::string& name) override
+    SystemError leaveFolder(const FileDescriptor& parent, const std::string& name) override
     {
-        return ::unlinkat(parent.get(), name.c_str(), AT_REMOVEDIR) == 0 ? 0 : errno;
+        return SystemError::unless(::unlinkat(parent.get(), name.c_str(), AT_REMOVEDIR) == 0, name);
     }
 };
 
 class VersionReading : public TreeVisitor {
 public:
-    explicit VersionReading(TreeVersions& versions)
-        : _versions(versions)
+    SystemError visitItem(const FileDescriptor&, const std::string&, const struct stat& found) override
     {
+        note(found);
+        return {};
     }
-    int visitItem(const FileDescriptor&, const std::string&, const struct stat& found) override
+    SystemError enterFolder(
+        const FileDescriptor&, const struct stat& self, const std::vector<std::string>&) override
     {
-        return note(found);
+        note(self);
+        return {};
     }
-    int enterFolder(const FileDescriptor&, const struct stat& self, const std::vector<std::string>&) override
-    {
-        return note(self);
-    }
+    TreeVersions versions;
 
 private:
-    int note(const struct stat& found)
+    void note(const struct stat& found)
     {
         auto version = versionOf(found);
-        if (_versions.empty())
+        if (versions.empty())
             version.changed = 0;
-        _versions.emplace(std::pair(version.device, version.inode), version);
-        return 0;
+        versions.emplace(std::pair(version.device, version.inode), version);
     }
-    TreeVersions& _versions;
 };
 
 } // namespace
 
-int readNames(const FileDescriptor& folder, std::vector<std::string>& names)
+SystemResult<std::vector<std::string>> readNames(const FileDescriptor& folder)
 {
+    std::vector<std::string> names;
     const auto reader = std::make_unique<DirectoryReader>(folder);
     while (const auto entry = reader->next())
         names.emplace_back(entry->name);
-    return reader->errorNumber();
+    if (reader->errorNumber() != 0)
+        return SystemError(reader->errorNumber());
+    return names;
 }
 
-int walkTree(const FileDescriptor& parent, const std::string& name, TreeVisitor& visitor)
+SystemError walkTree(const FileDescriptor& parent, const std::string& name, TreeVisitor& visitor)
 {
-    struct stat found;
-    if (::fstatat(parent.get(), name.c_str(), &found, AT_SYMLINK_NOFOLLOW) != 0)
-        return errno;
-    return S_ISDIR(found.st_mode) ? Walk(visitor).run(parent, name) : visitor.visitItem(parent, name, found);
+    const auto found = statusAt(parent, name);
+    if (!found)
+        return found.error;
+    return S_ISDIR(found->st_mode) ? Walk(visitor).run(parent, name)
+                                   : visitor.visitItem(parent, name, *found);
 }
 
-int removeTree(const FileDescriptor& folder, const std::string& name)
+SystemError removeTree(const FileDescriptor& folder, const std::string& name)
 {
     Removal removal;
     return walkTree(folder, name, removal);
 }
 
-int readVersions(const FileDescriptor& folder, const std::string& name, TreeVersions& versions)
+SystemResult<TreeVersions> readVersions(const FileDescriptor& folder, const std::string& name)
 {
-    VersionReading reading(versions);
-    return walkTree(folder, name, reading);
+    VersionReading reading;
+    TRW_TRY(walkTree(folder, name, reading));
+    return std::move(reading.versions);
 }
 
 } // namespace host::drive
