@@ -67,7 +67,7 @@ int LocalCloudStore::fetch(const std::string& content, const FileDescriptor& int
     std::uint64_t done = 0;
     const int failure = copyBytes(from, into, [&](std::uint64_t copied) {
         done = copied;
-        return progress(copied, total) == Continue::Yes ? 0 : ECANCELED;
+        return progress(copied, total) == Continue::Yes ? SystemError() : SystemError(ECANCELED, content);
     });
     return failure != 0 ? failure : done < total ? EIO : 0;
 }
@@ -108,7 +108,7 @@ int LocalCloudStore::move(const std::string& content, const std::string& newCont
 bool LocalCloudStore::holdsOtherThan(const std::string& content, const FileDescriptor& document)
 {
     const auto file = openContent(content);
-    return file ? compareBytes(file, document) != 0 : errno != ENOENT;
+    return file ? static_cast<bool>(compareBytes(file, document)) : errno != ENOENT;
 }
 
 platform::Result<std::vector<std::string>> LocalCloudStore::listChanges(platform::Date since)

@@ -18,6 +18,8 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
+using host::system::SystemResult;
 using platform::Error;
 using platform::FileContent;
 using platform::FileErrorCode;
@@ -96,12 +98,11 @@ Error contentError(int errorNumber, const std::string& path)
     return errorNumber == ECANCELED ? Error(FileErrorCode::Cancelled) : itemError(errorNumber, path);
 }
 
-/// Access and attributes of another document; answers 0 or the errno.
-int takeOver(const NewFile& file, const OpenDocument& from, std::string_view except)
+/// Access and attributes of another document.
+SystemError takeOver(const NewFile& file, const OpenDocument& from, std::string_view except)
 {
-    if (const int failure = copyAttributes(from.file, file.descriptor(), except); failure != 0)
-        return failure;
-    return ::fchmod(file.descriptor().get(), from.found.st_mode & 07777) == 0 ? 0 : errno;
+    TRW_TRY(copyAttributes(from.file, file.descriptor(), except));
+    return SystemError::unless(::fchmod(file.descriptor().get(), from.found.st_mode & 07777) == 0);
 }
 
 } // namespace

@@ -63,7 +63,7 @@ bool holdsFolder(const TreeVersions& tree, const FileDescriptor& folder)
 SystemResult<TreeVersions> copyTo(const LocatedItem& source, const DriveEntry& target,
     const std::string& temporary, const std::string& newName)
 {
-    TRW_TRY(SystemError(copyTree(source.entry.folder, source.name, target.folder, temporary)));
+    TRW_TRY(copyTree(source.entry.folder, source.name, target.folder, temporary));
     auto copied = readVersions(target.folder, temporary);
     if (!copied)
         return copied;

@@ -3,6 +3,7 @@
 
 #include "host/drive/changes/TreeCopy.h"
 
+#include "host/drive/changes/DriveEntry.h"
 #include "host/drive/changes/TreeWalk.h"
 #include "host/drive/records/BeneathRoot.h"
 
@@ -12,11 +13,14 @@
 #include <algorithm>
 #include <array>
 #include <cerrno>
+#include <cstring>
 #include <memory>
 
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
+using host::system::SystemResult;
 
 namespace {
 
@@ -29,122 +33,117 @@ FileDescriptor openForReading(const FileDescriptor& folder, const std::string& n
     return FileDescriptor(::openat(folder.get(), name.c_str(), O_RDONLY | openFlags));
 }
 
-int readAttribute(const FileDescriptor& file, const char* name, std::string& value)
+SystemResult<std::string> readAttribute(const FileDescriptor& file, const char* name)
 {
-    value.resize(64 * 1024); // the kernel's own limit
+    std::string value(64 * 1024, '\0'); // the kernel's own limit
     const auto length = ::fgetxattr(file.get(), name, value.data(), value.size());
     if (length < 0)
-        return errno;
+        return SystemError::last(name);
     value.resize(static_cast<std::size_t>(length));
-    return 0;
+    return value;
 }
 
 /// Attributes, access and dates, and then to the disk: the last steps of a copy.
-int finish(const FileDescriptor& from, const FileDescriptor& to, const struct stat& status)
+SystemError finish(const FileDescriptor& from, const FileDescriptor& to, const struct stat& status)
 {
-    if (const int failure = copyAttributes(from, to); failure != 0)
-        return failure;
+    TRW_TRY(copyAttributes(from, to));
     const timespec times[] = {status.st_atim, status.st_mtim};
     const bool isDone = ::fchmod(to.get(), status.st_mode & 07777) == 0 && ::futimens(to.get(), times) == 0
         && ::fsync(to.get()) == 0;
-    return isDone ? 0 : errno;
+    return SystemError::unless(isDone);
 }
 
 using Piece = std::array<char, 64 * 1024>;
 
-ssize_t readPiece(const FileDescriptor& file, Piece& piece)
+SystemResult<std::size_t> readPiece(const FileDescriptor& file, Piece& piece)
 {
     std::size_t filled = 0;
     while (filled < piece.size()) {
         const auto length = ::read(file.get(), piece.data() + filled, piece.size() - filled);
         if (length < 0 && errno != EINTR)
-            return -1;
+            return SystemError::last();
         if (length == 0)
             break;
         filled += length > 0 ? static_cast<std::size_t>(length) : 0;
     }
-    return static_cast<ssize_t>(filled);
+    return filled;
 }
 
-int writePiece(const FileDescriptor& file, const char* bytes, std::size_t length)
+SystemError writePiece(const FileDescriptor& file, const char* bytes, std::size_t length)
 {
     while (length > 0) {
         const auto written = ::write(file.get(), bytes, length);
         if (written < 0 && errno != EINTR)
-            return errno;
+            return SystemError::last();
         const auto done = written > 0 ? static_cast<std::size_t>(written) : 0;
         bytes += done;
         length -= done;
     }
-    return 0;
+    return {};
 }
 
-int copyFile(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
+SystemError copyFile(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
     const std::string& newName)
 {
     const auto from = openForReading(folder, name);
     struct stat status;
     if (!from || ::fstat(from.get(), &status) != 0)
-        return errno;
+        return SystemError::last(name);
     if (!S_ISREG(status.st_mode))
-        return EOPNOTSUPP;
+        return {EOPNOTSUPP, name};
     const FileDescriptor to(
         ::openat(target.get(), newName.c_str(), O_RDWR | O_CREAT | O_EXCL | openFlags, S_IRUSR | S_IWUSR));
     if (!to)
-        return errno;
-    int failure = copyBytes(from, to, {});
-    if (failure == 0)
-        failure = finish(from, to, status);
-    return failure == 0 ? compareBytes(from, to) : failure;
+        return SystemError::last(newName);
+    TRW_TRY(copyBytes(from, to, {}));
+    TRW_TRY(finish(from, to, status));
+    return compareBytes(from, to);
 }
 
-int copyLink(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
+SystemError copyLink(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
     const std::string& newName)
 {
     std::array<char, 4096> destination{};
     const auto length = ::readlinkat(folder.get(), name.c_str(), destination.data(), destination.size() - 1);
-    if (length < 0 || ::symlinkat(destination.data(), target.get(), newName.c_str()) != 0)
-        return errno;
-    return 0;
+    return SystemError::unless(
+        length >= 0 && ::symlinkat(destination.data(), target.get(), newName.c_str()) == 0, name);
 }
 
-int copyItem(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
+SystemError copyItem(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
     const std::string& newName, int level);
 
-int copyFolder(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
+SystemError copyFolder(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
     const std::string& newName, int level)
 {
     const auto from = openSubfolder(folder, name);
     struct stat status;
     if (!from || ::fstat(from.get(), &status) != 0)
-        return errno;
+        return SystemError::last(name);
     if (::mkdirat(target.get(), newName.c_str(), S_IRWXU) != 0)
-        return errno;
+        return SystemError::last(newName);
     const auto to = openSubfolder(target, newName);
     if (!to)
-        return errno;
+        return SystemError::last(newName);
     const auto names = readNames(from);
     if (!names)
         return names.error;
-    for (const auto& each : *names) {
-        if (const int failure = copyItem(from, each, to, each, level + 1); failure != 0)
-            return failure;
-    }
+    for (const auto& each : *names)
+        TRW_TRY(copyItem(from, each, to, each, level + 1));
     return finish(from, to, status);
 }
 
-int copyItem(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
+SystemError copyItem(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
     const std::string& newName, int level)
 {
-    struct stat found;
-    if (::fstatat(folder.get(), name.c_str(), &found, AT_SYMLINK_NOFOLLOW) != 0)
-        return errno;
+    const auto found = statusAt(folder, name);
+    if (!found)
+        return found.error;
     if (level >= mostLevels)
-        return ELOOP;
-    if (S_ISDIR(found.st_mode))
+        return {ELOOP, name};
+    if (S_ISDIR(found->st_mode))
         return copyFolder(folder, name, target, newName, level);
-    return S_ISLNK(found.st_mode) ? copyLink(folder, name, target, newName)
-                                  : copyFile(folder, name, target, newName);
+    return S_ISLNK(found->st_mode) ? copyLink(folder, name, target, newName)
+                                   : copyFile(folder, name, target, newName);
 }
 
 /// What is compared: two names in two open folders.
@@ -187,76 +186,74 @@ bool isSameLink(const Pair& pair)
 
 bool isSameItem(const Pair& pair, int level)
 {
-    struct stat found, other;
-    if (::fstatat(pair.folder.get(), pair.name.c_str(), &found, AT_SYMLINK_NOFOLLOW) != 0
-        || ::fstatat(pair.otherFolder.get(), pair.otherName.c_str(), &other, AT_SYMLINK_NOFOLLOW) != 0
-        || (found.st_mode & S_IFMT) != (other.st_mode & S_IFMT))
+    const auto found = statusAt(pair.folder, pair.name);
+    const auto other = found ? statusAt(pair.otherFolder, pair.otherName) : found.error;
+    if (!found || !other || (found->st_mode & S_IFMT) != (other->st_mode & S_IFMT))
         return false;
-    if (S_ISDIR(found.st_mode))
+    if (S_ISDIR(found->st_mode))
         return isSameFolder(pair, level);
-    if (S_ISLNK(found.st_mode))
+    if (S_ISLNK(found->st_mode))
         return isSameLink(pair);
     const auto a = openForReading(pair.folder, pair.name),
                b = openForReading(pair.otherFolder, pair.otherName);
-    return S_ISREG(found.st_mode) && a && b && compareBytes(a, b) == 0;
+    return S_ISREG(found->st_mode) && a && b && !compareBytes(a, b);
 }
 
 } // namespace
 
-int copyAttributes(const FileDescriptor& from, const FileDescriptor& to, std::string_view except)
+SystemError copyAttributes(const FileDescriptor& from, const FileDescriptor& to, std::string_view except)
 {
-    std::string names(64 * 1024, '\0'), value;
+    std::string names(64 * 1024, '\0');
     const auto length = ::flistxattr(from.get(), names.data(), names.size());
     if (length < 0)
-        return errno == EOPNOTSUPP ? 0 : errno;
+        return SystemError::unless(errno == EOPNOTSUPP);
     for (const char* name = names.data(); name < names.data() + length;
          name += std::char_traits<char>::length(name) + 1) {
         if (!std::string_view(name).starts_with("user.") || name == except)
             continue;
-        if (const int failure = readAttribute(from, name, value); failure != 0)
-            return failure;
-        if (::fsetxattr(to.get(), name, value.data(), value.size(), 0) != 0)
-            return errno;
+        const auto value = readAttribute(from, name);
+        if (!value)
+            return value.error;
+        if (::fsetxattr(to.get(), name, value->data(), value->size(), 0) != 0)
+            return SystemError::last(name);
     }
-    return 0;
+    return {};
 }
 
-int copyBytes(
-    const FileDescriptor& from, const FileDescriptor& to, const std::function<int(std::uint64_t)>& copied)
+SystemError copyBytes(const FileDescriptor& from, const FileDescriptor& to,
+    const std::function<SystemError(std::uint64_t)>& copied)
 {
     const auto piece = std::make_unique<Piece>();
     std::uint64_t done = 0;
     for (;;) {
         const auto length = readPiece(from, *piece);
-        if (length <= 0)
-            return length < 0 ? errno : 0;
-        int failure = writePiece(to, piece->data(), static_cast<std::size_t>(length));
-        done += static_cast<std::uint64_t>(length);
-        if (failure == 0 && copied)
-            failure = copied(done);
-        if (failure != 0)
-            return failure;
+        if (!length || *length == 0)
+            return length.error;
+        TRW_TRY(writePiece(to, piece->data(), *length));
+        done += *length;
+        if (copied)
+            TRW_TRY(copied(done));
     }
 }
 
-int compareBytes(const FileDescriptor& a, const FileDescriptor& b)
+SystemError compareBytes(const FileDescriptor& a, const FileDescriptor& b)
 {
     if (::lseek(a.get(), 0, SEEK_SET) != 0 || ::lseek(b.get(), 0, SEEK_SET) != 0)
-        return errno;
+        return SystemError::last();
     const auto first = std::make_unique<Piece>(), second = std::make_unique<Piece>();
     for (;;) {
         const auto length = readPiece(a, *first);
         const auto other = readPiece(b, *second);
-        if (length < 0 || other < 0)
-            return errno;
-        if (length != other || !std::equal(first->begin(), first->begin() + length, second->begin()))
-            return EIO;
-        if (length == 0)
-            return 0;
+        if (!length || !other)
+            return length ? other.error : length.error;
+        if (*length != *other || std::memcmp(first->data(), second->data(), *length) != 0)
+            return SystemError(EIO);
+        if (*length == 0)
+            return {};
     }
 }
 
-int copyTree(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
+SystemError copyTree(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
     const std::string& newName)
 {
     return copyItem(folder, name, target, newName, 0);
