@@ -71,9 +71,10 @@ int HeldItem::take(const DriveLayout& layout, const DriveEntry& entry, const std
     item._name = heldName(name);
     const auto origin = entry.path.substr(0, entry.path.rfind('/') + 1);
     const auto working = (item._isAside ? layout.held() + '/' : origin) + item._name;
-    if (const int failure = WorkRecord::write(layout, {origin + name, working, copy}, item._record);
-        failure != 0)
-        return failure;
+    auto record = WorkRecord::write(layout, {origin + name, working, copy});
+    if (!record)
+        return record.error;
+    item._record.emplace(std::move(*record));
     if (const int failure = renameEntry(item._origin, name, item.folder(), item._name); failure != 0)
         return failure;
     item._isThere = true;

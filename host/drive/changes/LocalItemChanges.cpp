@@ -215,17 +215,14 @@ SystemError LocalItemChanges::moveAcross(
     const auto temporary = uniqueName(WorkRecord::temporaryPrefix);
     const auto folder = target.path.substr(0, target.path.rfind('/') + 1);
     const auto item = source.entry.path.substr(0, source.entry.path.rfind('/') + 1) + source.name;
-    std::optional<WorkRecord> record;
-    auto failure =
-        SystemError(WorkRecord::write(_layout, {item, folder + temporary, folder + newName}, record));
-    const auto copied =
-        failure ? SystemResult<TreeVersions>(failure) : copyTo(source, target, temporary, newName);
+    const auto record = WorkRecord::write(_layout, {item, folder + temporary, folder + newName});
+    const auto copied = record ? copyTo(source, target, temporary, newName) : record.error;
     if (!copied) {
         static_cast<void>(removeTree(target.folder, temporary));
         return copied.error;
     }
     // From here on the copy is whole and has its name: the worst that can be is that both are there.
-    failure = syncFolder(target.folder);
+    auto failure = syncFolder(target.folder);
     if (!failure)
         failure = removeMoved(source, *before, folder + newName);
     if (failure)

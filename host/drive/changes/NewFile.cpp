@@ -10,6 +10,8 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
+using host::system::SystemResult;
 
 NewFile::NewFile(NewFile&& other) noexcept
     : _record(std::move(other._record))
@@ -30,9 +32,10 @@ int NewFile::create(const DriveLayout& layout, const DriveEntry& entry, std::opt
     NewFile fresh;
     const auto name = uniqueName(WorkRecord::temporaryPrefix);
     const auto folder = entry.path.substr(0, entry.path.rfind('/') + 1);
-    if (const int failure = WorkRecord::write(layout, {entry.path, folder + name, {}}, fresh._record);
-        failure != 0)
-        return failure;
+    auto record = WorkRecord::write(layout, {entry.path, folder + name, {}});
+    if (!record)
+        return record.error;
+    fresh._record.emplace(std::move(*record));
     fresh._folder = FileDescriptor(::fcntl(entry.folder.get(), F_DUPFD_CLOEXEC, 0));
     fresh._file = FileDescriptor(
         ::openat(entry.folder.get(), name.c_str(), O_RDWR | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC, 0666));
@@ -68,19 +71,17 @@ int NewFile::publish(const DriveEntry& entry, const std::string& name)
 }
 
 /// What lies under this name after a kill is kept: it may be what another program has saved.
-int NewFile::takeHeldName(const DriveLayout& layout, const DriveEntry& entry)
+SystemError NewFile::takeHeldName(const DriveLayout& layout, const DriveEntry& entry)
 {
     auto held = uniqueName(WorkRecord::heldPrefix);
     const auto folder = entry.path.substr(0, entry.path.rfind('/') + 1);
-    std::optional<WorkRecord> record;
-    int failure = WorkRecord::write(layout, {entry.path, folder + held, {}}, record);
-    if (failure == 0)
-        failure = renameEntry(_folder, _name, _folder, held);
-    if (failure != 0)
-        return failure;
+    auto record = WorkRecord::write(layout, {entry.path, folder + held, {}});
+    if (!record)
+        return record.error;
+    TRW_TRY(renameEntry(_folder, _name, _folder, held));
     _name = std::move(held);
     _record.emplace(std::move(*record));
-    return 0;
+    return {};
 }
 
 int NewFile::exchange(const DriveEntry& entry) const

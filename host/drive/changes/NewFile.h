@@ -40,7 +40,7 @@ public:
 
 private:
     NewFile() = default;
-    int takeHeldName(const DriveLayout& layout, const DriveEntry& entry);
+    system::SystemError takeHeldName(const DriveLayout& layout, const DriveEntry& entry);
     int exchange(const DriveEntry& entry) const;
     /// 0 when what was taken out is `expected`.
     int checkExchanged(const platform::ItemVersion& expected, platform::ItemVersion& written) const;

@@ -15,6 +15,8 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
+using host::system::SystemResult;
 
 namespace {
 
@@ -65,7 +67,7 @@ WorkRecord::~WorkRecord()
         ::unlink(_path.c_str());
 }
 
-int WorkRecord::write(const DriveLayout& layout, const Places& places, std::optional<WorkRecord>& record)
+SystemResult<WorkRecord> WorkRecord::write(const DriveLayout& layout, const Places& places)
 {
     if (const auto folder = openOwnFolder(layout.held()); !folder)
         return folder.error;
@@ -75,13 +77,12 @@ int WorkRecord::write(const DriveLayout& layout, const Places& places, std::opti
     fresh._path = layout.held() + '/' + lastName(places.working) + std::string(recordSuffix);
     fresh._file = FileDescriptor(::open(fresh._path.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0600));
     if (!fresh._file && !isFull())
-        return errno;
+        return SystemError::last(fresh._path);
     if (fresh._file && !lockWhole(fresh._file, F_OFD_SETLKW))
-        return errno;
+        return SystemError::last(fresh._path);
     if (fresh._file && ::write(fresh._file.get(), text.data(), text.size()) < 0 && !isFull())
-        return errno;
-    record.emplace(std::move(fresh));
-    return 0;
+        return SystemError::last(fresh._path);
+    return fresh;
 }
 
 bool WorkRecord::isRecorded(const DriveLayout& layout, const std::string& name)

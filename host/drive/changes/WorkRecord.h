@@ -5,9 +5,9 @@
 
 #include "host/drive/records/DriveLayout.h"
 #include "host/system/files/FileDescriptor.h"
+#include "host/system/files/SystemError.h"
 
 #include <functional>
-#include <optional>
 #include <string>
 
 namespace host::drive {
@@ -33,9 +33,9 @@ public:
     /// A copy that is not whole yet.
     static constexpr const char* temporaryPrefix = ".trwtmp-";
 
-    /// Writes a record. Answers 0 or the errno; a full disk is no error, since something must be removable
-    /// there: the record is then empty.
-    static int write(const DriveLayout& layout, const Places& places, std::optional<WorkRecord>& record);
+    /// Writes a record. A full disk is no error, since something must be removable there: the record is then
+    /// empty.
+    static system::SystemResult<WorkRecord> write(const DriveLayout& layout, const Places& places);
     /// Hands out every record whose process is gone. Those that `settle` answers true for go; the others stay
     /// for another time.
     static void forEachAbandoned(const DriveLayout& layout, const std::function<bool(const Places&)>& settle);
