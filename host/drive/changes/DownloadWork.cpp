@@ -19,6 +19,7 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
 using platform::Error;
 using platform::FileErrorCode;
 
@@ -35,7 +36,7 @@ std::string joined(const std::vector<std::string>& tags)
 }
 
 /// What the promise says beside the content becomes the file's own.
-int mark(const FileDescriptor& file, const PromiseRecord& promise)
+SystemError mark(const FileDescriptor& file, const PromiseRecord& promise)
 {
     const auto role = !promise.role                        ? ""
         : *promise.role == platform::SharedItemRole::Owner ? "owner"
@@ -48,10 +49,10 @@ int mark(const FileDescriptor& file, const PromiseRecord& promise)
         {itemMark::status, "current"}};
     for (const auto& [name, value] : marks) {
         if (!value.empty() && ::fsetxattr(file.get(), name, value.data(), value.size(), 0) != 0)
-            return errno;
+            return SystemError::last(name);
     }
     if (!promise.modified)
-        return 0;
+        return {};
     auto seconds = promise.modified->nanoseconds / nanosecondsPerSecond;
     auto rest = promise.modified->nanoseconds % nanosecondsPerSecond;
     if (rest < 0) {
@@ -59,16 +60,17 @@ int mark(const FileDescriptor& file, const PromiseRecord& promise)
         rest += nanosecondsPerSecond;
     }
     const timespec times[] = {{0, UTIME_OMIT}, {seconds, rest}};
-    return ::futimens(file.get(), times) == 0 ? 0 : errno;
+    return SystemError::unless(::futimens(file.get(), times) == 0);
 }
 
 /// A download that ends short must not take the place of the document.
-int checkSize(const FileDescriptor& file, const PromiseRecord& promise)
+SystemError checkSize(const FileDescriptor& file, const PromiseRecord& promise)
 {
     struct stat found;
     if (::fstat(file.get(), &found) != 0)
-        return errno;
-    return promise.size && static_cast<std::uint64_t>(found.st_size) < *promise.size ? EIO : 0;
+        return SystemError::last();
+    const bool isShort = promise.size && static_cast<std::uint64_t>(found.st_size) < *promise.size;
+    return isShort ? SystemError(EIO) : SystemError();
 }
 
 /// One that was deleted or moved away while its content came must not show again where it was.
@@ -88,23 +90,20 @@ int settlePromise(const DriveLayout& layout, const DriveEntry& entry, CloudStore
     return ENOENT;
 }
 
-int fetchInto(const DriveLayout& layout, CloudStore& store, const DriveEntry& entry,
+SystemError fetchInto(const DriveLayout& layout, CloudStore& store, const DriveEntry& entry,
     const PromiseRecord& promise, const CloudStore::Progress& progress)
 {
-    std::optional<NewFile> file;
-    int failure = NewFile::create(layout, entry, file);
-    if (failure == 0)
-        failure = store.fetch(promise.content, file->descriptor(), progress);
-    if (failure == 0)
-        failure = checkSize(file->descriptor(), promise);
-    if (failure == 0)
-        failure = mark(file->descriptor(), promise);
+    auto file = NewFile::create(layout, entry);
+    if (!file)
+        return file.error;
+    TRW_TRY(SystemError(store.fetch(promise.content, file->descriptor(), progress)));
+    TRW_TRY(checkSize(file->descriptor(), promise));
+    TRW_TRY(mark(file->descriptor(), promise));
     struct stat whole;
-    if (failure == 0)
-        failure = ::fstat(file->descriptor().get(), &whole) == 0 ? 0 : errno;
-    if (failure == 0)
-        failure = file->publish(entry, entry.name);
-    return failure == 0 ? settlePromise(layout, entry, store, versionOf(whole)) : failure;
+    if (::fstat(file->descriptor().get(), &whole) != 0)
+        return SystemError::last(entry.name);
+    TRW_TRY(file->publish(entry, entry.name));
+    return settlePromise(layout, entry, store, versionOf(whole));
 }
 
 Error missingContent(const std::string& path)

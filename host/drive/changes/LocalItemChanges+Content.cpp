@@ -52,50 +52,46 @@ Result<OpenDocument> openDocument(const DriveLayout& layout, const std::string& 
     return document;
 }
 
-/// 0 when both the document and its folder may be written, else the errno.
-int checkWritable(const OpenDocument& document)
+/// Whether both the document and its folder may be written, and else why not.
+SystemError checkWritable(const OpenDocument& document)
 {
     const int folder = document.entry.folder.get();
     const bool isWritable = ::faccessat(folder, document.entry.name.c_str(), W_OK, AT_EACCESS) == 0
         && ::faccessat(folder, ".", W_OK, AT_EACCESS) == 0;
     // The one who may write everything still respects what is meant to stay as it is.
     if (isWritable && (document.found.st_mode & 0222) == 0)
-        return EACCES;
-    return isWritable ? 0 : errno;
+        return {EACCES, document.entry.name};
+    return SystemError::unless(isWritable, document.entry.name);
 }
 
-/// Reads from the start; answers 0 or the errno.
-int readBytes(const FileDescriptor& file, std::size_t size, std::string& bytes)
+/// Reads from the start; ECANCELED when there is less by now.
+SystemResult<std::string> readBytes(const FileDescriptor& file, std::size_t size)
 {
-    bytes.resize(size);
+    std::string bytes(size, '\0');
     for (std::size_t filled = 0; filled < size;) {
         const auto length =
             ::pread(file.get(), bytes.data() + filled, size - filled, static_cast<off_t>(filled));
         if (length < 0 && errno != EINTR)
-            return errno;
+            return SystemError::last();
         if (length == 0)
-            return ECANCELED; // it was made shorter meanwhile
+            return SystemError(ECANCELED);
         filled += length > 0 ? static_cast<std::size_t>(length) : 0;
     }
-    return 0;
+    return bytes;
 }
 
-/// 0 when a document holds these bytes, ECANCELED when it does not, else the errno.
-int compareContent(const OpenDocument& document, const FileContent& before)
+/// ECANCELED when a document does not hold these bytes.
+SystemError compareContent(const OpenDocument& document, const FileContent& before)
 {
     if (versionOf(document.found) == before.version)
-        return 0;
+        return {};
     // Tags, a new name or a new copy of the same content are no change of it.
     if (static_cast<std::size_t>(document.found.st_size) != before.bytes->size())
-        return ECANCELED;
-    std::string bytes;
-    const int failure = readBytes(document.file, before.bytes->size(), bytes);
-    return failure == 0 && bytes != *before.bytes ? ECANCELED : failure;
-}
-
-Error contentError(int errorNumber, const std::string& path)
-{
-    return errorNumber == ECANCELED ? Error(FileErrorCode::Cancelled) : itemError(errorNumber, path);
+        return {ECANCELED, document.entry.name};
+    const auto bytes = readBytes(document.file, before.bytes->size());
+    if (!bytes)
+        return bytes.error;
+    return *bytes == *before.bytes ? SystemError() : SystemError(ECANCELED, document.entry.name);
 }
 
 /// Access and attributes of another document.
@@ -103,6 +99,34 @@ SystemError takeOver(const NewFile& file, const OpenDocument& from, std::string_
 {
     TRW_TRY(copyAttributes(from.file, file.descriptor(), except));
     return SystemError::unless(::fchmod(file.descriptor().get(), from.found.st_mode & 07777) == 0);
+}
+
+SystemResult<ItemVersion> replaceBytes(const DriveLayout& layout, const OpenDocument& document,
+    const FileContent& before, std::string_view content)
+{
+    TRW_TRY(checkWritable(document));
+    TRW_TRY(compareContent(document, before));
+    auto file = NewFile::create(layout, document.entry);
+    if (!file)
+        return file.error;
+    TRW_TRY(file->write(content));
+    TRW_TRY(takeOver(*file, document, {}));
+    return file->replace(layout, document.entry, versionOf(document.found));
+}
+
+/// Makes a document with access and attributes of another one, where that can be had.
+SystemError addFile(
+    const DriveLayout& layout, const DriveEntry& entry, const std::string& like, std::string_view content)
+{
+    TRW_TRY(entry.checkIsFree());
+    auto file = NewFile::create(layout, entry);
+    if (!file)
+        return file.error;
+    TRW_TRY(file->write(content));
+    // It is a document of its own: the other one keeps the identifier.
+    if (const auto model = openDocument(layout, like))
+        TRW_TRY(takeOver(*file, *model, itemMark::documentIdentifier));
+    return file->publish(entry, entry.name);
 }
 
 } // namespace
@@ -115,19 +139,18 @@ Result<FileContent> LocalItemChanges::contentToReplace(
         const auto document = openDocument(_layout, path);
         if (!document)
             return *document.error;
-        if (const int failure = checkWritable(*document); failure != 0)
+        if (const auto failure = checkWritable(*document))
             return itemError(failure, path);
         const auto size = static_cast<std::size_t>(document->found.st_size);
         if (size > maximumBytes)
             return itemError(EFBIG, path);
-        std::string bytes;
-        const int failure = readBytes(document->file, size, bytes);
-        if (failure != 0 && failure != ECANCELED)
-            return itemError(failure, path);
+        auto bytes = readBytes(document->file, size);
+        if (!bytes && !bytes.error.is(ECANCELED))
+            return itemError(bytes.error, path);
         struct stat after;
-        if (failure == 0 && ::fstat(document->file.get(), &after) == 0
+        if (bytes && ::fstat(document->file.get(), &after) == 0
             && versionOf(after) == versionOf(document->found))
-            return FileContent{std::make_shared<const std::string>(std::move(bytes)), versionOf(after)};
+            return FileContent{std::make_shared<const std::string>(std::move(*bytes)), versionOf(after)};
     }
     return itemError(EBUSY, path);
 }
@@ -138,22 +161,12 @@ Result<ItemVersion> LocalItemChanges::replaceContent(
     const auto document = openDocument(_layout, path);
     if (!document)
         return *document.error;
-    std::optional<NewFile> file;
-    int failure = checkWritable(*document);
-    if (failure == 0)
-        failure = compareContent(*document, before);
-    if (failure == 0)
-        failure = NewFile::create(_layout, document->entry, file);
-    if (failure == 0)
-        failure = file->write(content);
-    if (failure == 0)
-        failure = takeOver(*file, *document, {});
-    ItemVersion written;
-    if (failure == 0)
-        failure = file->replace(_layout, document->entry, versionOf(document->found), written);
-    if (failure != 0)
-        return contentError(failure, path);
-    return written;
+    const auto written = replaceBytes(_layout, *document, before, content);
+    if (written)
+        return *written;
+    if (written.error.is(ECANCELED))
+        return Error(FileErrorCode::Cancelled);
+    return itemError(written.error, path);
 }
 
 std::optional<Error> LocalItemChanges::addDocument(
@@ -162,19 +175,8 @@ std::optional<Error> LocalItemChanges::addDocument(
     const auto entry = DriveEntry::open(_layout, path);
     if (!entry)
         return entry.error;
-    if (const auto failure = entry->checkIsFree())
-        return itemError(failure, path);
-    std::optional<NewFile> file;
-    int failure = NewFile::create(_layout, *entry, file);
-    if (failure == 0)
-        failure = file->write(content);
-    // It is a document of its own: the other one keeps the identifier.
-    const auto model = openDocument(_layout, like);
-    if (failure == 0 && model)
-        failure = takeOver(*file, *model, itemMark::documentIdentifier);
-    if (failure == 0)
-        failure = file->publish(*entry, entry->name);
-    return failure == 0 ? std::nullopt : std::optional(itemError(failure, path));
+    const auto failure = addFile(_layout, *entry, like, content);
+    return failure ? std::optional(itemError(failure, path)) : std::nullopt;
 }
 
 } // namespace host::drive

@@ -265,22 +265,19 @@ std::optional<Error> LocalItemChanges::evictItem(const std::string& path)
     return failure == 0 ? std::nullopt : std::optional(changeError(failure, path));
 }
 
-int LocalItemChanges::replaceByPromise(const LocatedItem& item)
+SystemError LocalItemChanges::replaceByPromise(const LocatedItem& item)
 {
     const auto& entry = item.entry;
     const auto content = uniqueName("content-");
     const auto promise = promiseFor(lookAtFile(descriptorPath(entry.folder) + '/' + entry.name), content);
-    std::optional<NewFile> file;
-    int failure = NewFile::create(_layout, entry, file);
-    if (failure == 0)
-        failure = file->write(promise.toJson());
+    auto file = NewFile::create(_layout, entry);
+    if (!file)
+        return file.error;
+    TRW_TRY(file->write(promise.toJson()));
     // While both are there the document counts; it goes only when its promise is safe on the disk.
-    if (failure == 0)
-        failure = file->publish(entry, entry.promiseName());
-    if (failure != 0)
-        return failure;
-    failure = _store->store(entry, versionOf(item.found), content);
-    if (failure != 0 && entry.status())
+    TRW_TRY(file->publish(entry, entry.promiseName()));
+    SystemError failure = _store->store(entry, versionOf(item.found), content);
+    if (failure && entry.status())
         dropRedundantPromise(entry, *_store);
     // The document's old name needs no sync: come back after a power cut it would hide its promise, no more.
     return failure;

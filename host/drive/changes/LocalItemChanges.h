@@ -53,7 +53,7 @@ private:
     system::SystemError removeMoved(
         const LocatedItem& source, const TreeVersions& before, const std::string& copy);
     void withdraw(const DriveEntry& target, const std::string& name, const TreeVersions& copied);
-    int replaceByPromise(const LocatedItem& item);
+    system::SystemError replaceByPromise(const LocatedItem& item);
 
     DriveLayout _layout;
     std::shared_ptr<CloudStore> _store;

@@ -12,6 +12,7 @@ namespace host::drive {
 using host::system::FileDescriptor;
 using host::system::SystemError;
 using host::system::SystemResult;
+using platform::ItemVersion;
 
 NewFile::NewFile(NewFile&& other) noexcept
     : _record(std::move(other._record))
@@ -27,7 +28,7 @@ NewFile::~NewFile()
         ::unlinkat(_folder.get(), _name.c_str(), 0);
 }
 
-int NewFile::create(const DriveLayout& layout, const DriveEntry& entry, std::optional<NewFile>& file)
+SystemResult<NewFile> NewFile::create(const DriveLayout& layout, const DriveEntry& entry)
 {
     NewFile fresh;
     const auto name = uniqueName(WorkRecord::temporaryPrefix);
@@ -40,32 +41,30 @@ int NewFile::create(const DriveLayout& layout, const DriveEntry& entry, std::opt
     fresh._file = FileDescriptor(
         ::openat(entry.folder.get(), name.c_str(), O_RDWR | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC, 0666));
     if (!fresh._folder || !fresh._file)
-        return errno;
+        return SystemError::last(name);
     fresh._name = name;
-    file.emplace(std::move(fresh));
-    return 0;
+    return fresh;
 }
 
-int NewFile::write(std::string_view text) const
+SystemError NewFile::write(std::string_view text) const
 {
     while (!text.empty()) {
         const auto written = ::write(_file.get(), text.data(), text.size());
         if (written < 0 && errno != EINTR)
-            return errno;
+            return SystemError::last(_name);
         text.remove_prefix(written > 0 ? static_cast<std::size_t>(written) : 0);
     }
-    return 0;
+    return {};
 }
 
-int NewFile::publish(const DriveEntry& entry, const std::string& name)
+SystemError NewFile::publish(const DriveEntry& entry, const std::string& name)
 {
     if (::fsync(_file.get()) != 0)
-        return errno;
-    if (const int failure = renameEntry(_folder, _name, entry.folder, name); failure != 0)
-        return failure;
-    const int failure = syncFolder(entry.folder);
+        return SystemError::last(_name);
+    TRW_TRY(renameEntry(_folder, _name, entry.folder, name));
+    auto failure = syncFolder(entry.folder);
     // It comes back under its private name, and goes with it.
-    if (failure == 0 || renameEntry(entry.folder, name, _folder, _name) != 0)
+    if (!failure || renameEntry(entry.folder, name, _folder, _name))
         _name.clear();
     return failure;
 }
@@ -84,11 +83,11 @@ SystemError NewFile::takeHeldName(const DriveLayout& layout, const DriveEntry& e
     return {};
 }
 
-int NewFile::exchange(const DriveEntry& entry) const
+SystemError NewFile::exchange(const DriveEntry& entry) const
 {
     const int done =
         ::renameat2(_folder.get(), _name.c_str(), entry.folder.get(), entry.name.c_str(), RENAME_EXCHANGE);
-    return done == 0 ? 0 : errno;
+    return SystemError::unless(done == 0, entry.name);
 }
 
 bool NewFile::isUnderPrivateName() const
@@ -99,36 +98,37 @@ bool NewFile::isUnderPrivateName() const
         && own.st_dev == found.st_dev && own.st_ino == found.st_ino;
 }
 
-int NewFile::checkExchanged(const platform::ItemVersion& expected, platform::ItemVersion& written) const
+SystemResult<ItemVersion> NewFile::checkExchanged(const ItemVersion& expected) const
 {
-    struct stat found, own;
-    if (::fstatat(_folder.get(), _name.c_str(), &found, AT_SYMLINK_NOFOLLOW) != 0
-        || ::fstat(_file.get(), &own) != 0)
-        return errno;
-    written = versionOf(own);
-    return isSameContent(versionOf(found), expected) ? 0 : ECANCELED;
+    const auto found = statusAt(_folder, _name);
+    if (!found)
+        return found.error;
+    struct stat own;
+    if (::fstat(_file.get(), &own) != 0)
+        return SystemError::last(_name);
+    if (!isSameContent(versionOf(*found), expected))
+        return SystemError(ECANCELED, _name);
+    return versionOf(own);
 }
 
-int NewFile::replace(const DriveLayout& layout, const DriveEntry& entry,
-    const platform::ItemVersion& expected, platform::ItemVersion& written)
+SystemResult<ItemVersion> NewFile::replace(
+    const DriveLayout& layout, const DriveEntry& entry, const ItemVersion& expected)
 {
     if (::fsync(_file.get()) != 0)
-        return errno;
-    int failure = takeHeldName(layout, entry);
-    if (failure == 0)
-        failure = exchange(entry);
-    if (failure != 0)
-        return failure;
+        return SystemError::last(_name);
+    TRW_TRY(takeHeldName(layout, entry));
+    TRW_TRY(exchange(entry));
     // Only what was taken out can be looked at without somebody replacing it meanwhile.
-    failure = checkExchanged(expected, written);
-    if (failure == 0)
-        failure = syncFolder(entry.folder);
-    const bool isKnown = failure == 0 || (exchange(entry) == 0 && isUnderPrivateName());
+    auto written = checkExchanged(expected);
+    const auto failure = written ? syncFolder(entry.folder) : written.error;
+    const bool isKnown = !failure || (!exchange(entry) && isUnderPrivateName());
     // What could not be looked at or removed is left to the next start.
     if (!isKnown || ::unlinkat(_folder.get(), _name.c_str(), 0) != 0)
         _record->keep();
     _name.clear();
-    return failure;
+    if (failure)
+        return failure;
+    return written;
 }
 
 } // namespace host::drive

@@ -19,31 +19,31 @@ namespace host::drive {
 /// changed.
 class NewFile {
 public:
-    /// Makes it, empty, beside an entry; answers 0 or the errno.
-    static int create(const DriveLayout& layout, const DriveEntry& entry, std::optional<NewFile>& file);
+    /// Makes it, empty, beside an entry.
+    static system::SystemResult<NewFile> create(const DriveLayout& layout, const DriveEntry& entry);
 
     NewFile(NewFile&& other) noexcept;
     NewFile& operator=(NewFile&&) = delete;
     ~NewFile();
 
     const system::FileDescriptor& descriptor() const { return _file; }
-    /// Writes a text; answers 0 or the errno.
-    int write(std::string_view text) const;
-    /// Syncs the file and gives it its name; nothing is replaced (EEXIST). Answers 0 or the errno. The record
-    /// for the next start stays until the end.
-    int publish(const DriveEntry& entry, const std::string& name);
-    /// Syncs the file and gives it the name of one that is `expected`, which goes for good. Answers 0,
-    /// ECANCELED when another version lies there by now, or the errno; nothing has changed then. After a kill
-    /// in between, both are there: one of them in the trash. `written` is the version that lies there now.
-    int replace(const DriveLayout& layout, const DriveEntry& entry, const platform::ItemVersion& expected,
-        platform::ItemVersion& written);
+    /// Writes a text.
+    system::SystemError write(std::string_view text) const;
+    /// Syncs the file and gives it its name; nothing is replaced (EEXIST). The record for the next
+    /// start stays until the end.
+    system::SystemError publish(const DriveEntry& entry, const std::string& name);
+    /// Syncs the file and gives it the name of one that is `expected`, which goes for good. Answers
+    /// the version that lies there now, ECANCELED when another one had taken its place; after a failure
+    /// nothing has changed. After a kill in between, both are there: one of them in the trash.
+    system::SystemResult<platform::ItemVersion> replace(
+        const DriveLayout& layout, const DriveEntry& entry, const platform::ItemVersion& expected);
 
 private:
     NewFile() = default;
     system::SystemError takeHeldName(const DriveLayout& layout, const DriveEntry& entry);
-    int exchange(const DriveEntry& entry) const;
-    /// 0 when what was taken out is `expected`.
-    int checkExchanged(const platform::ItemVersion& expected, platform::ItemVersion& written) const;
+    system::SystemError exchange(const DriveEntry& entry) const;
+    /// This file's version, when what was taken out is `expected`; else ECANCELED.
+    system::SystemResult<platform::ItemVersion> checkExchanged(const platform::ItemVersion& expected) const;
     bool isUnderPrivateName() const;
 
     std::optional<WorkRecord> _record;
