@@ -74,20 +74,20 @@ SystemError checkSize(const FileDescriptor& file, const PromiseRecord& promise)
 }
 
 /// One that was deleted or moved away while its content came must not show again where it was.
-int settlePromise(const DriveLayout& layout, const DriveEntry& entry, CloudStore& store,
+SystemError settlePromise(const DriveLayout& layout, const DriveEntry& entry, CloudStore& store,
     const platform::ItemVersion& published)
 {
-    struct stat found;
-    if (::fstatat(entry.folder.get(), entry.promiseName().c_str(), &found, AT_SYMLINK_NOFOLLOW) == 0) {
+    if (statusAt(entry.folder, entry.promiseName())) {
         dropRedundantPromise(entry, store);
-        return 0;
+        return {};
     }
-    std::optional<HeldItem> held;
-    if (HeldItem::take(layout, entry, entry.name, held) == 0
-        && ::fstatat(held->folder().get(), held->name().c_str(), &found, AT_SYMLINK_NOFOLLOW) == 0
-        && isSameContent(published, versionOf(found)))
-        held->remove(nullptr);
-    return ENOENT;
+    if (auto held = HeldItem::take(layout, entry, entry.name)) {
+        const auto found = statusAt(held->folder(), held->name());
+        // What cannot be removed comes back, and is the document that somebody asked for.
+        if (found && isSameContent(published, versionOf(*found)))
+            static_cast<void>(held->remove(nullptr));
+    }
+    return {ENOENT, entry.promiseName()};
 }
 
 SystemError fetchInto(const DriveLayout& layout, CloudStore& store, const DriveEntry& entry,

@@ -16,6 +16,8 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
+using host::system::SystemResult;
 
 namespace {
 
@@ -54,8 +56,8 @@ HeldItem::~HeldItem()
         putBack();
 }
 
-int HeldItem::take(const DriveLayout& layout, const DriveEntry& entry, const std::string& name,
-    std::optional<HeldItem>& held, const std::string& copy)
+SystemResult<HeldItem> HeldItem::take(
+    const DriveLayout& layout, const DriveEntry& entry, const std::string& name, const std::string& copy)
 {
     HeldItem item;
     auto aside = openOwnFolder(layout.held());
@@ -63,7 +65,7 @@ int HeldItem::take(const DriveLayout& layout, const DriveEntry& entry, const std
     if (!aside)
         return aside.error;
     if (!item._origin)
-        return errno;
+        return SystemError::last(entry.path);
     item._aside = std::move(*aside);
     item._isAside = isOnOneFileSystem(item._aside, item._origin);
     item._originName = name;
@@ -75,23 +77,20 @@ int HeldItem::take(const DriveLayout& layout, const DriveEntry& entry, const std
     if (!record)
         return record.error;
     item._record.emplace(std::move(*record));
-    if (const int failure = renameEntry(item._origin, name, item.folder(), item._name); failure != 0)
-        return failure;
+    TRW_TRY(renameEntry(item._origin, name, item.folder(), item._name));
     item._isThere = true;
-    held.emplace(std::move(item));
-    return 0;
+    return item;
 }
 
-int HeldItem::decide(const char* prefix)
+SystemError HeldItem::decide(const char* prefix)
 {
     auto decided = prefix + _name.substr(std::string_view(WorkRecord::heldPrefix).size());
-    if (const int failure = renameEntry(folder(), _name, folder(), decided); failure != 0)
-        return failure;
+    TRW_TRY(renameEntry(folder(), _name, folder(), decided));
     _name = std::move(decided);
     return syncFolder(_origin);
 }
 
-int HeldItem::remove(CloudStore* store)
+SystemError HeldItem::remove(CloudStore* store)
 {
     static constexpr platform::Operation op{"-[HeldItem remove]"};
     Discarded discarded{Discarded::Part::Nothing, checkRemovable(folder(), _name)};
@@ -108,21 +107,21 @@ int HeldItem::remove(CloudStore* store)
         op.warning("Not all of %@ could be removed yet: %@", _path, discarded.failure);
         _record->keep();
     }
-    return 0;
+    return {};
 }
 
 void HeldItem::putBack()
 {
     static constexpr platform::Operation op{"-[HeldItem putBack]"};
     _isThere = false;
-    const int failure = renameEntry(folder(), _name, _origin, _originName);
-    if (failure == 0)
+    const auto failure = renameEntry(folder(), _name, _origin, _originName);
+    if (!failure)
         return;
     // Someone saved a new one meanwhile, or the folder is gone: both are kept. Under a name that says that
     // it is to be removed it would not be.
     if (!_name.starts_with(WorkRecord::heldPrefix)) {
         auto undecided = WorkRecord::heldPrefix + _name.substr(_name.find('-') + 1);
-        if (renameEntry(folder(), _name, folder(), undecided) == 0)
+        if (!renameEntry(folder(), _name, folder(), undecided))
             _name = std::move(undecided);
     }
     op.warning("Cannot put back %@, kept as %@: %@", _path, _name, itemError(failure, _path));

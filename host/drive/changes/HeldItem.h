@@ -23,9 +23,9 @@ class CloudStore;
 class HeldItem {
 public:
     /// Takes the item away; `name` is its own or its promise's. `copy` is where a whole copy of it lies, if
-    /// it is removed because it was copied. Answers 0 and fills `held`, else the errno.
-    static int take(const DriveLayout& layout, const DriveEntry& entry, const std::string& name,
-        std::optional<HeldItem>& held, const std::string& copy = {});
+    /// it is removed because it was copied.
+    static system::SystemResult<HeldItem> take(const DriveLayout& layout, const DriveEntry& entry,
+        const std::string& name, const std::string& copy = {});
 
     HeldItem(HeldItem&& other) noexcept;
     HeldItem& operator=(HeldItem&&) = delete;
@@ -36,13 +36,13 @@ public:
     const std::string& name() const { return _name; }
 
     /// Removes it for good, with the contents behind its promises where a store is given. All or nothing:
-    /// answers 0, or the errno and puts it back whole. What cannot be removed once the first part is gone is
+    /// after a failure it is put back whole. What cannot be removed once the first part is gone is
     /// removed at the next start; the item counts as removed then.
-    int remove(CloudStore* store);
+    system::SystemError remove(CloudStore* store);
 
 private:
     HeldItem() = default;
-    int decide(const char* prefix);
+    system::SystemError decide(const char* prefix);
     void putBack();
 
     system::FileDescriptor _origin, _aside; ///< its folder; the private one

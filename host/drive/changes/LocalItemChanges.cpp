@@ -151,8 +151,9 @@ SystemError LocalItemChanges::removeLocated(const LocatedItem& item)
     const auto before = readVersions(item.entry.folder, item.name);
     if (!before)
         return before.error;
-    std::optional<HeldItem> held;
-    TRW_TRY(SystemError(HeldItem::take(_layout, item.entry, item.name, held)));
+    auto held = HeldItem::take(_layout, item.entry, item.name);
+    if (!held)
+        return held.error;
     const auto after = readVersions(held->folder(), held->name());
     if (!after)
         return after.error;
@@ -233,8 +234,8 @@ SystemError LocalItemChanges::moveAcross(
 void LocalItemChanges::withdraw(const DriveEntry& target, const std::string& name, const TreeVersions& copied)
 {
     // The original is there still. A copy that somebody has changed by now is more than a copy.
-    std::optional<HeldItem> held;
-    if (HeldItem::take(_layout, target, name, held))
+    auto held = HeldItem::take(_layout, target, name);
+    if (!held)
         return;
     if (const auto found = readVersions(held->folder(), held->name()); found && *found == copied)
         static_cast<void>(held->remove(nullptr));
@@ -243,8 +244,9 @@ void LocalItemChanges::withdraw(const DriveEntry& target, const std::string& nam
 SystemError LocalItemChanges::removeMoved(
     const LocatedItem& source, const TreeVersions& before, const std::string& copy)
 {
-    std::optional<HeldItem> held;
-    TRW_TRY(SystemError(HeldItem::take(_layout, source.entry, source.name, held, copy)));
+    auto held = HeldItem::take(_layout, source.entry, source.name, copy);
+    if (!held)
+        return held.error;
     const auto after = readVersions(held->folder(), held->name());
     if (!after)
         return after.error;

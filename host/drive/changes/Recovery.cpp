@@ -94,16 +94,18 @@ bool Recovery::settleCopy(const WorkRecord::Places& places)
     return false;
 }
 
-int Recovery::finishMove(const WorkRecord::Places& places)
+SystemError Recovery::finishMove(const WorkRecord::Places& places)
 {
     const auto item = DriveEntry::open(_layout, places.item), copy = DriveEntry::open(_layout, places.copy);
     if (!item || !copy || !isSameTree(item->folder, item->name, copy->folder, copy->name))
-        return 0;
-    std::optional<HeldItem> held;
-    if (const int failure = HeldItem::take(_layout, *item, item->name, held, places.copy); failure != 0)
-        return failure;
+        return {};
+    auto held = HeldItem::take(_layout, *item, item->name, places.copy);
+    if (!held)
+        return held.error;
     // What changed between the two looks comes back.
-    return isSameTree(held->folder(), held->name(), copy->folder, copy->name) ? held->remove(nullptr) : 0;
+    if (!isSameTree(held->folder(), held->name(), copy->folder, copy->name))
+        return {};
+    return held->remove(nullptr);
 }
 
 bool Recovery::settleHeld(const WorkRecord::Places& places)

@@ -31,7 +31,7 @@ private:
     bool settleCopy(const WorkRecord::Places& places);
     bool settleHeld(const WorkRecord::Places& places);
     bool discard(const DriveEntry& entry, bool contentsToo);
-    int finishMove(const WorkRecord::Places& places);
+    system::SystemError finishMove(const WorkRecord::Places& places);
     bool putBack(const DriveEntry& held, const std::string& item);
     bool moveToTrash(const DriveEntry& held, const std::string& item);
     void settleStrays();

@@ -51,10 +51,10 @@ protected:
     }
     std::optional<HeldItem> take(const Url& item) const
     {
-        std::optional<HeldItem> held;
         const auto entry = DriveEntry::open(layout(), item.path());
-        EXPECT_EQ(HeldItem::take(layout(), *entry, entry->name, held), 0);
-        return held;
+        auto held = HeldItem::take(layout(), *entry, entry->name);
+        EXPECT_FALSE(held.error);
+        return std::move(held.value);
     }
     static std::string markOf(const std::string& path, const char* name)
     {
