@@ -15,8 +15,8 @@
 namespace host::drive {
 
 /// Where the contents behind promises are kept, each under a name of its own that promises carry. Any thread;
-/// every call is synchronous and may wait for a network. What answers an int answers 0 or an errno: ENOENT
-/// for a content that is not there, ETIMEDOUT or EHOSTUNREACH for a store that cannot be reached.
+/// every call is synchronous and may wait for a network. Errors: ENOENT for a content that is not there,
+/// ETIMEDOUT or EHOSTUNREACH for a store that cannot be reached.
 class CloudStore {
 public:
     enum class Continue { Yes, No };
@@ -28,16 +28,16 @@ public:
 
     /// Writes a content to an open, empty file. Whole, or it fails: EIO for one that ends short, ECANCELED
     /// for one that was ended.
-    virtual int fetch(
+    virtual system::SystemError fetch(
         const std::string& content, const system::FileDescriptor& into, const Progress& progress) = 0;
     /// Takes a document over as the content: its name is free then. One that is another version by now stays,
     /// or comes back (ECANCELED).
-    virtual int store(
+    virtual system::SystemError store(
         const DriveEntry& document, const platform::ItemVersion& version, const std::string& content) = 0;
     /// Removes a content for good. One that is not there is no error.
-    virtual int remove(const std::string& content) = 0;
+    virtual system::SystemError remove(const std::string& content) = 0;
     /// Gives a content another name; none is replaced (EEXIST).
-    virtual int move(const std::string& content, const std::string& newContent) = 0;
+    virtual system::SystemError move(const std::string& content, const std::string& newContent) = 0;
 
     /// Whether something that differs from an open document is kept under the name. What cannot be compared
     /// differs.

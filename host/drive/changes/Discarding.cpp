@@ -54,13 +54,14 @@ public:
         const FileDescriptor& folder, const std::string& name, const struct stat& found) override
     {
         if (_store && S_ISREG(found.st_mode) && PromiseRecord::itemPathFor(name)) {
-            std::string content;
-            SystemError failed = contentOfPromise(folder, name, content);
-            if (!failed && !content.empty())
-                failed = _store->remove(content);
-            if (failed)
-                return note(failed);
-            hasBegun = hasBegun || !content.empty();
+            const auto content = contentOfPromise(folder, name);
+            if (!content)
+                return note(content.error);
+            if (!content->empty()) {
+                if (const auto failed = _store->remove(*content))
+                    return note(failed);
+                hasBegun = true;
+            }
         }
         const bool isGone = ::unlinkat(folder.get(), name.c_str(), 0) == 0 || errno == ENOENT;
         return note(SystemError::unless(isGone, name));

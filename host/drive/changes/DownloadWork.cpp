@@ -83,7 +83,7 @@ SystemError settlePromise(const DriveLayout& layout, const DriveEntry& entry, Cl
     }
     if (auto held = HeldItem::take(layout, entry, entry.name)) {
         const auto found = statusAt(held->folder(), held->name());
-        // What cannot be removed comes back, and is the document that somebody asked for.
+        // One that cannot be removed is put back, because a document too many is better than one too few.
         if (found && isSameContent(published, versionOf(*found)))
             static_cast<void>(held->remove(nullptr));
     }
@@ -96,7 +96,7 @@ SystemError fetchInto(const DriveLayout& layout, CloudStore& store, const DriveE
     auto file = NewFile::create(layout, entry);
     if (!file)
         return file.error;
-    TRW_TRY(SystemError(store.fetch(promise.content, file->descriptor(), progress)));
+    TRW_TRY(store.fetch(promise.content, file->descriptor(), progress));
     TRW_TRY(checkSize(file->descriptor(), promise));
     TRW_TRY(mark(file->descriptor(), promise));
     struct stat whole;
@@ -127,11 +127,11 @@ std::optional<Error> bringHere(const DriveLayout& layout, CloudStore& store, con
         return Error(FileErrorCode::Unsupported);
     if (promise->content.empty())
         return missingContent(path);
-    const int failure = fetchInto(layout, store, item->entry, *promise, progress);
-    if (failure == 0)
+    const auto failure = fetchInto(layout, store, item->entry, *promise, progress);
+    if (!failure)
         return std::nullopt;
     // What is missing may be the promise or what it stands for.
-    if (failure == ENOENT && item->entry.find())
+    if (failure.is(ENOENT) && item->entry.find())
         return missingContent(path);
     return itemError(failure, path);
 }

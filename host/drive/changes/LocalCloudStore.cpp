@@ -16,6 +16,7 @@ namespace host::drive {
 
 using host::system::FileDescriptor;
 using host::system::SystemError;
+using host::system::SystemResult;
 using platform::ItemVersion;
 
 namespace {
@@ -37,42 +38,51 @@ SystemError checkStored(const FileDescriptor& folder, const std::string& content
 
 } // namespace
 
-FileDescriptor LocalCloudStore::openFolder() const
+SystemResult<FileDescriptor> LocalCloudStore::openFolder() const
 {
-    return FileDescriptor(::open(_layout.cloud().c_str(), O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
+    const auto path = _layout.cloud();
+    FileDescriptor folder(::open(path.c_str(), O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
+    if (!folder)
+        return SystemError::last(path);
+    return folder;
 }
 
-FileDescriptor LocalCloudStore::openContent(const std::string& content) const
+SystemResult<FileDescriptor> LocalCloudStore::openContent(const std::string& content) const
 {
-    if (!isPlainName(content)) {
-        errno = ENOENT;
-        return {};
-    }
-    // Why the folder cannot be had stays in errno: only what is missing is nothing.
+    if (!isPlainName(content))
+        return SystemError(ENOENT, content);
     const auto folder = openFolder();
-    return folder ? FileDescriptor(::openat(
-               folder.get(), content.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC))
-                  : FileDescriptor();
+    if (!folder)
+        return folder.error;
+    constexpr int flags = O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC;
+    FileDescriptor file(::openat(folder->get(), content.c_str(), flags));
+    if (!file)
+        return SystemError::last(content);
+    return file;
 }
 
-int LocalCloudStore::fetch(const std::string& content, const FileDescriptor& into, const Progress& progress)
+SystemError LocalCloudStore::fetch(
+    const std::string& content, const FileDescriptor& into, const Progress& progress)
 {
     const auto from = openContent(content);
+    if (!from)
+        return from.error;
     struct stat found;
-    if (!from || ::fstat(from.get(), &found) != 0)
-        return errno;
+    if (::fstat(from->get(), &found) != 0)
+        return SystemError::last(content);
     if (!S_ISREG(found.st_mode))
-        return EOPNOTSUPP;
+        return {EOPNOTSUPP, content};
     const auto total = static_cast<std::uint64_t>(found.st_size);
     std::uint64_t done = 0;
-    const int failure = copyBytes(from, into, [&](std::uint64_t copied) {
+    TRW_TRY(copyBytes(*from, into, [&](std::uint64_t copied) {
         done = copied;
         return progress(copied, total) == Continue::Yes ? SystemError() : SystemError(ECANCELED, content);
-    });
-    return failure != 0 ? failure : done < total ? EIO : 0;
+    }));
+    return done < total ? SystemError(EIO, content) : SystemError();
 }
 
-int LocalCloudStore::store(const DriveEntry& document, const ItemVersion& version, const std::string& content)
+SystemError LocalCloudStore::store(
+    const DriveEntry& document, const ItemVersion& version, const std::string& content)
 {
     const auto folder = openOwnFolder(_layout.cloud());
     if (!folder)
@@ -87,28 +97,31 @@ int LocalCloudStore::store(const DriveEntry& document, const ItemVersion& versio
     return failure;
 }
 
-int LocalCloudStore::remove(const std::string& content)
+SystemError LocalCloudStore::remove(const std::string& content)
 {
     if (!isPlainName(content))
-        return 0;
-    const auto folder = openFolder();
-    return (folder && ::unlinkat(folder.get(), content.c_str(), 0) == 0) || errno == ENOENT ? 0 : errno;
-}
-
-int LocalCloudStore::move(const std::string& content, const std::string& newContent)
-{
-    if (!isPlainName(content) || !isPlainName(newContent))
-        return ENOENT;
+        return {};
     const auto folder = openFolder();
     if (!folder)
-        return errno;
-    return renameEntry(folder, content, folder, newContent);
+        return folder.error.is(ENOENT) ? SystemError() : folder.error;
+    const bool isGone = ::unlinkat(folder->get(), content.c_str(), 0) == 0 || errno == ENOENT;
+    return SystemError::unless(isGone, content);
+}
+
+SystemError LocalCloudStore::move(const std::string& content, const std::string& newContent)
+{
+    if (!isPlainName(content) || !isPlainName(newContent))
+        return {ENOENT, content};
+    const auto folder = openFolder();
+    if (!folder)
+        return folder.error;
+    return renameEntry(*folder, content, *folder, newContent);
 }
 
 bool LocalCloudStore::holdsOtherThan(const std::string& content, const FileDescriptor& document)
 {
     const auto file = openContent(content);
-    return file ? static_cast<bool>(compareBytes(file, document)) : errno != ENOENT;
+    return file ? static_cast<bool>(compareBytes(*file, document)) : !file.error.is(ENOENT);
 }
 
 platform::Result<std::vector<std::string>> LocalCloudStore::listChanges(platform::Date since)

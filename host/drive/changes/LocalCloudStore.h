@@ -16,19 +16,19 @@ public:
     {
     }
 
-    int fetch(
+    system::SystemError fetch(
         const std::string& content, const system::FileDescriptor& into, const Progress& progress) override;
-    int store(const DriveEntry& document, const platform::ItemVersion& version,
+    system::SystemError store(const DriveEntry& document, const platform::ItemVersion& version,
         const std::string& content) override;
-    int remove(const std::string& content) override;
-    int move(const std::string& content, const std::string& newContent) override;
+    system::SystemError remove(const std::string& content) override;
+    system::SystemError move(const std::string& content, const std::string& newContent) override;
     bool holdsOtherThan(const std::string& content, const system::FileDescriptor& document) override;
     platform::Result<std::vector<std::string>> listChanges(platform::Date since) override;
     platform::Result<StorageSpace> quota() override;
 
 private:
-    system::FileDescriptor openFolder() const;
-    system::FileDescriptor openContent(const std::string& content) const;
+    system::SystemResult<system::FileDescriptor> openFolder() const;
+    system::SystemResult<system::FileDescriptor> openContent(const std::string& content) const;
 
     DriveLayout _layout;
 };

@@ -278,7 +278,7 @@ SystemError LocalItemChanges::replaceByPromise(const LocatedItem& item)
     TRW_TRY(file->write(promise.toJson()));
     // While both are there the document counts; it goes only when its promise is safe on the disk.
     TRW_TRY(file->publish(entry, entry.promiseName()));
-    SystemError failure = _store->store(entry, versionOf(item.found), content);
+    auto failure = _store->store(entry, versionOf(item.found), content);
     if (failure && entry.status())
         dropRedundantPromise(entry, *_store);
     // The document's old name needs no sync: come back after a power cut it would hide its promise, no more.

@@ -13,6 +13,8 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
+using host::system::SystemResult;
 
 platform::Result<PromiseRecord> readPromise(const DriveEntry& entry)
 {
@@ -25,16 +27,17 @@ platform::Result<PromiseRecord> readPromise(const DriveEntry& entry)
                    : damagedRecord(entry.path, "its promise is no JSON object");
 }
 
-int contentOfPromise(const FileDescriptor& folder, const std::string& promiseName, std::string& content)
+SystemResult<std::string> contentOfPromise(const FileDescriptor& folder, const std::string& promiseName)
 {
     const auto text =
         host::system::readWholeFile(folder, promiseName, PromiseRecord::maximumFileSize, promiseName);
     const auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
-    content = promise ? promise->content : std::string();
     // What is too large is damaged; nothing else that the system says means that nothing lies behind it.
     const bool hasFailed =
         text.error && text.error->domain() == platform::errorDomain::system && text.error->code() != EFBIG;
-    return hasFailed ? text.error->code() : 0;
+    if (hasFailed)
+        return SystemError(text.error->code(), promiseName);
+    return promise ? promise->content : std::string();
 }
 
 void dropRedundantPromise(const DriveEntry& entry, CloudStore& store)
@@ -50,7 +53,7 @@ void dropRedundantPromise(const DriveEntry& entry, CloudStore& store)
     if (!content.empty() && store.holdsOtherThan(content, document))
         return;
     // The content first: a promise with nothing behind it is found again, a content without a promise is not.
-    if (content.empty() || store.remove(content) == 0)
+    if (content.empty() || !store.remove(content))
         ::unlinkat(entry.folder.get(), entry.promiseName().c_str(), 0);
 }
 

@@ -13,10 +13,10 @@ namespace host::drive {
 /// The promise of an entry as it lies on the disk. Errors: the system's, or CloudErrorCode::DamagedRecord.
 platform::Result<PromiseRecord> readPromise(const DriveEntry& entry);
 
-/// Finds the name of the content behind a promise file of an open folder; it is empty when the promise names
-/// none or is damaged. Answers 0, or the errno of what could not be read.
-int contentOfPromise(
-    const system::FileDescriptor& folder, const std::string& promiseName, std::string& content);
+/// The name of the content behind a promise file of an open folder; it is empty when the promise names none
+/// or is damaged. It fails with what could not be read.
+system::SystemResult<std::string> contentOfPromise(
+    const system::FileDescriptor& folder, const std::string& promiseName);
 
 /// Removes the promise beside a document when it adds nothing: nothing lies behind it, or what the document
 /// holds as well. Any other is an item that nobody has seen since the document hides it, and stays.

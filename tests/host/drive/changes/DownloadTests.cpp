@@ -22,6 +22,7 @@ using host::drive::CloudStore;
 using host::drive::LocalCloudStore;
 using host::drive::PromiseRecord;
 using host::system::FileDescriptor;
+using host::system::SystemError;
 using platform::DownloadProgress;
 using platform::Error;
 using platform::FileErrorCode;
@@ -31,12 +32,14 @@ using platform::Url;
 class FaultyStore : public LocalCloudStore {
 public:
     using LocalCloudStore::LocalCloudStore;
-    int fetch(const std::string& content, const FileDescriptor& into, const Progress& progress) override
+    SystemError fetch(
+        const std::string& content, const FileDescriptor& into, const Progress& progress) override
     {
         beforeFetch();
         if (failAfterHalf == 0)
             return LocalCloudStore::fetch(content, into, progress);
-        return ::write(into.get(), "half", 4) == 4 ? failAfterHalf : errno;
+        const bool isWritten = ::write(into.get(), "half", 4) == 4;
+        return isWritten ? SystemError(failAfterHalf, content) : SystemError::last(content);
     }
     std::function<void()> beforeFetch = [] {};
     int failAfterHalf = 0; ///< an errno; 0: no fault
@@ -289,13 +292,13 @@ TEST_F(DownloadTest, TheStoreKeepsItsContentsApart)
     std::ofstream(content("b")) << "b";
     EXPECT_THAT(list(0), testing::UnorderedElementsAre("a", "b"));
     EXPECT_THAT(list(INT64_MAX), testing::IsEmpty());
-    EXPECT_EQ(store.move("a", "b"), EEXIST);
-    EXPECT_EQ(store.move("a", "../a"), ENOENT);
-    EXPECT_EQ(store.move("a", "c"), 0);
+    EXPECT_TRUE(store.move("a", "b").is(EEXIST));
+    EXPECT_TRUE(store.move("a", "../a").is(ENOENT));
+    EXPECT_FALSE(store.move("a", "c"));
     EXPECT_EQ(read(content("c")), "a");
-    EXPECT_EQ(store.remove("../account.json"), 0);
-    EXPECT_EQ(store.remove("gone"), 0);
-    EXPECT_EQ(store.remove("b"), 0);
+    EXPECT_FALSE(store.remove("../account.json"));
+    EXPECT_FALSE(store.remove("gone"));
+    EXPECT_FALSE(store.remove("b"));
     EXPECT_THAT(list(0), testing::ElementsAre("c"));
     EXPECT_TRUE(fs::exists(layout().account()));
     EXPECT_GT(store.quota()->total, 0);
