@@ -164,9 +164,7 @@ Result<ItemVersion> LocalItemChanges::replaceContent(
     const auto written = replaceBytes(_layout, *document, before, content);
     if (written)
         return *written;
-    if (written.error.is(ECANCELED))
-        return Error(FileErrorCode::Cancelled);
-    return itemError(written.error, path);
+    return written.error.is(ECANCELED) ? Error(FileErrorCode::Cancelled) : itemError(written.error, path);
 }
 
 std::optional<Error> LocalItemChanges::addDocument(

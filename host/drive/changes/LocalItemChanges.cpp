@@ -71,9 +71,9 @@ SystemResult<TreeVersions> copyTo(const LocatedItem& source, const DriveEntry& t
     return copied;
 }
 
-Error changeError(int errorNumber, const std::string& path)
+Error changeError(const SystemError& failure, const std::string& path)
 {
-    return errorNumber == changedMeanwhile ? Error(FileErrorCode::Cancelled) : itemError(errorNumber, path);
+    return failure.is(changedMeanwhile) ? Error(FileErrorCode::Cancelled) : itemError(failure, path);
 }
 
 /// Makes one folder and notes it, unless it is there already.
@@ -142,8 +142,8 @@ std::optional<Error> LocalItemChanges::removeItem(
         return Error(FileErrorCode::Cancelled);
     if (!item->isPromise())
         dropRedundantPromise(item->entry, *_store);
-    const int failure = removeLocated(*item);
-    return failure == 0 ? std::nullopt : std::optional(changeError(failure, path));
+    const auto failure = removeLocated(*item);
+    return failure ? std::optional(changeError(failure, path)) : std::nullopt;
 }
 
 SystemError LocalItemChanges::removeLocated(const LocatedItem& item)
@@ -179,28 +179,26 @@ std::optional<Error> LocalItemChanges::moveItem(const std::string& from, const s
     if (!source->isPromise())
         dropRedundantPromise(source->entry, *_store);
     const auto newName = source->isPromise() ? target->promiseName() : target->name;
-    int failure = moveWithin(*source, *target, newName);
-    if (failure == EXDEV)
+    auto failure = moveWithin(*source, *target, newName);
+    if (failure.is(EXDEV))
         failure = moveAcross(*source, *target, newName);
     // To the kernel it is an invalid argument when the one name leads through the other by a mount.
-    if (failure == ownFolder || failure == EINVAL)
+    if (failure.is(ownFolder) || failure.is(EINVAL))
         return intoItself(from, to);
-    if (failure != 0)
-        return failure == changedMeanwhile ? changeError(failure, from) : systemError(failure, from, to);
+    if (failure)
+        return failure.is(changedMeanwhile) ? changeError(failure, from) : systemError(failure, from, to);
     return std::nullopt;
 }
 
-int LocalItemChanges::moveWithin(
+SystemError LocalItemChanges::moveWithin(
     const LocatedItem& source, const DriveEntry& target, const std::string& newName)
 {
-    int failure = renameEntry(source.entry.folder, source.name, target.folder, newName);
-    if (failure != 0)
-        return failure;
-    failure = syncFolder(target.folder);
-    if (failure == 0)
+    TRW_TRY(renameEntry(source.entry.folder, source.name, target.folder, newName));
+    auto failure = syncFolder(target.folder);
+    if (!failure)
         failure = syncFolder(source.entry.folder);
     // A move that might not outlive a power cut is none.
-    if (failure != 0)
+    if (failure)
         static_cast<void>(renameEntry(target.folder, newName, source.entry.folder, source.name));
     return failure;
 }
@@ -263,8 +261,8 @@ std::optional<Error> LocalItemChanges::evictItem(const std::string& path)
     if (!S_ISREG(item->found.st_mode))
         return Error(FileErrorCode::Unsupported);
     dropRedundantPromise(item->entry, *_store);
-    const int failure = replaceByPromise(*item);
-    return failure == 0 ? std::nullopt : std::optional(changeError(failure, path));
+    const auto failure = replaceByPromise(*item);
+    return failure ? std::optional(changeError(failure, path)) : std::nullopt;
 }
 
 SystemError LocalItemChanges::replaceByPromise(const LocatedItem& item)

@@ -47,7 +47,8 @@ public:
 
 private:
     system::SystemError removeLocated(const LocatedItem& item);
-    int moveWithin(const LocatedItem& source, const DriveEntry& target, const std::string& newName);
+    system::SystemError moveWithin(
+        const LocatedItem& source, const DriveEntry& target, const std::string& newName);
     system::SystemError moveAcross(
         const LocatedItem& source, const DriveEntry& target, const std::string& newName);
     system::SystemError removeMoved(

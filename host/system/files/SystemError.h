@@ -19,8 +19,12 @@ class [[nodiscard]] SystemError {
 public:
     /// Nothing failed.
     SystemError() = default;
+    explicit SystemError(int number)
+        : _number(number)
+    {
+    }
     /// `about` is a name or a path as the call had it, as bytes.
-    SystemError(int number, std::string_view about = {})
+    SystemError(int number, std::string_view about)
         : _number(number)
         , _about(about)
     {
@@ -38,8 +42,6 @@ public:
         return succeeded ? SystemError() : last(about);
     }
 
-    /// For callers that still pass bare numbers on; it goes with the last of them.
-    operator int() const { return _number; }
     /// Whether something failed.
     explicit operator bool() const { return _number != 0; }
     bool is(int number) const { return _number == number; }
