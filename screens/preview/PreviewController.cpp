@@ -286,7 +286,8 @@ void PreviewController::connectPreview()
     shown->setOnFailure(weakly(this, &PreviewController::previewFailed));
     connectPages();
     if (const auto picture = std::dynamic_pointer_cast<PreviewPictureView>(shown))
-        picture->setOnNeedsPixels(weakly(this, &PreviewController::load, previewLimitsForCloseLook()));
+        picture->setOnNeedsPixels(
+            weakly(this, [](PreviewController& self) { self.load(previewLimitsForCloseLook()); }));
 }
 
 void PreviewController::updateBars()
