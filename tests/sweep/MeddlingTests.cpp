@@ -22,18 +22,20 @@ using sweep_tests::FileCall;
 
 constexpr const char* saved = "saved meanwhile";
 
-/// Another program works on the drive between two calls of the operation.
+/// Lets another program change the drive between two calls of the operation.
 class Meddling : public sweep_tests::SweepFixture {
 protected:
     std::string item() const { return GetParam().arguments[1]; }
-    /// What a program may save meanwhile: the item, the document deepest inside it, or one in place of it.
+    /// Answers the document that a program may save meanwhile: the item, the document deepest inside it, or
+    /// one in its place.
     std::string document() const
     {
         return at(item() == "folder" ? "folder/sub/b.txt" : item().substr(0, item().find('/')));
     }
     std::string target() const { return at(GetParam().arguments.back()); }
 
-    /// As editors do: beside the document, and then over its name. Answers whether it could.
+    /// Saves as editors do: into a file beside the document, which then replaces it. Answers whether it
+    /// could.
     static bool save(const std::string& path, const std::string& content = saved)
     {
         if (!fs::exists(fs::path(path).parent_path()))
@@ -43,7 +45,7 @@ protected:
         fs::rename(path + '~', path, error);
         return true;
     }
-    /// A folder goes aside, and a link to a place outside the drive takes its name.
+    /// Moves a folder aside and puts a link to a place outside the drive in its place.
     bool swap(const std::string& path) const
     {
         std::error_code error;
@@ -64,7 +66,7 @@ protected:
         return static_cast<std::size_t>(
             std::distance(fs::recursive_directory_iterator(_outside), fs::recursive_directory_iterator()));
     }
-    /// What the operation leaves in any case.
+    /// Answers the part of the drive that stays after the operation in any case.
     Drive lasting() const
     {
         makeDrive();
@@ -72,7 +74,7 @@ protected:
             run([](const FileCall&) { return Fault{}; });
         return seen();
     }
-    /// Lets the deed be done before each call in turn, and asks afterwards; not where it could not be done.
+    /// Performs the deed before each call in turn and checks afterwards, unless the deed was impossible.
     void atEachCall(
         const std::function<bool()>& deed, const std::function<void(const FileCall&)>& check) const
     {
@@ -109,13 +111,13 @@ TEST_P(Meddling, WhatIsSavedMeanwhileIsKept)
 {
     const auto stays = lasting();
     std::string replaced;
-    // What came before the operation looked at its item for the last time goes with it; what comes later does
-    // not.
+    // A save before the operation's last look at its item is removed with the item; a later save is not.
     bool isSeen = !isRemoval();
     atEachCall(
         [&] {
             replaced = fs::is_regular_file(document()) ? read(document()) : std::string();
-            // Somebody deleted what is being fetched, and makes another one of the same name.
+            // The other program deletes the document that is being downloaded, and makes another one of the
+            // same name.
             if (GetParam().arguments[0] == "fetch")
                 fs::remove(host::drive::PromiseRecord::pathFor(document()));
             return save(document());
@@ -177,7 +179,7 @@ Wanted have(const std::string& argument)
     };
 }
 
-/// Of documents that exist already.
+/// Answers whether the operation copies documents that exist already.
 bool copies(const sweep_tests::Operation& operation)
 {
     return operation.fileSystems == sweep_tests::FileSystems::Several && have("file.txt")(operation);

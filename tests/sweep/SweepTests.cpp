@@ -19,7 +19,8 @@ using sweep_tests::FileCall;
 
 class Sweep : public sweep_tests::SweepFixture {
 protected:
-    /// Which of two versions is wanted after a save that was interrupted only a person can say.
+    /// After an interrupted save only the user can say which of the two versions is wanted, so both may be
+    /// left.
     static testing::Matcher<std::vector<std::string>> isWhatMayBeLeft()
     {
         if (GetParam().arguments[0] == "save")
@@ -89,7 +90,7 @@ TEST_P(Sweep, AFailureOfAnyCallLeavesAllAsItWasOrAllDone)
             SCOPED_TRACE(std::string(::strerrorname_np(error)) + " at call " + std::to_string(point) + ", "
                 + std::to_string(met.number) + " on " + met.subject);
             const auto now = noticed();
-            // Only that the change reached the disk can fail once it is made.
+            // Once a change is made, only syncing it to the disk can still fail.
             EXPECT_TRUE((now == before && ending.status != 0)
                 || (now == after && (ending.status == 0 || met.number == SYS_fsync)))
                 << "status " << ending.status << differences(now, before);

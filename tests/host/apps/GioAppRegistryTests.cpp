@@ -22,8 +22,8 @@ using testing::ElementsAre;
 using testing::IsEmpty;
 using testing_support::TemporaryDirectory;
 
-/// A desktop of a few apps. The library below reads where they are described once for a process, so they are
-/// there before anything else.
+/// A desktop with a few apps. The library reads their descriptions once for a process, so they are written
+/// before anything else.
 class Desktop : public testing::Environment {
 public:
     void SetUp() override
@@ -34,7 +34,7 @@ public:
                  {"XDG_CONFIG_HOME", "config"}, {"XDG_CONFIG_DIRS", "none"}})
             setenv(variable, folder->at(place).c_str(), 1);
         unsetenv("XDG_CURRENT_DESKTOP");
-        // Answers with what it was given, through a pipe that waits for both ends.
+        // The app writes its arguments into a pipe, which waits for both ends.
         folder->write("open", "#!/bin/sh\nprintf '%s\\n' \"$#\" \"$1\" > " + answer() + "\n");
         chmod(folder->at("open").c_str(), 0700);
         mkfifo(answer().c_str(), 0600);
@@ -72,7 +72,8 @@ auto* const desktop = dynamic_cast<Desktop*>(testing::AddGlobalTestEnvironment(n
 
 class GioAppRegistryTest : public testing::Test {
 protected:
-    /// The apps of a document by their ranks, as "Rank: app app+", with a plus for those that open in place.
+    /// Answers the apps of a document by their ranks, as "Rank: app app+", with a plus for apps that open in
+    /// place.
     std::vector<std::string> ranked(const std::string& name) const
     {
         std::vector<std::string> lines;

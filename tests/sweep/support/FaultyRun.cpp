@@ -28,7 +28,7 @@ namespace sweep_tests {
 
 namespace {
 
-/// How a call names what it is about.
+/// Says how a call names its file.
 enum class Form { FolderAndPath, Path, OpenFile };
 
 struct CallKind {
@@ -81,7 +81,7 @@ const CallKind* kindOf(std::uint64_t number)
     return found == std::end(kinds) ? nullptr : found;
 }
 
-/// In the child: asks the kernel to report the calls; answers the descriptor that reports them.
+/// Runs in the child: asks the kernel to report the calls, and answers the descriptor that reports them.
 int installFilter()
 {
     std::vector<sock_filter> program{BPF_STMT(BPF_LD | BPF_W | BPF_ABS, offsetof(seccomp_data, nr))};
@@ -141,7 +141,7 @@ int receiveDescriptor(int socket)
 std::string textAt(pid_t process, std::uint64_t address)
 {
     std::array<char, 4096> text{};
-    // Not across the end of a page: the next may not be there.
+    // The text is read up to the end of the page, because the next page may not exist.
     const auto length = std::min<std::uint64_t>(text.size() - 1, 4096 - address % 4096);
     iovec here{text.data(), length}, there{reinterpret_cast<void*>(address), length};
     if (::process_vm_readv(process, &here, 1, &there, 1, 0) < 0)
@@ -158,7 +158,7 @@ std::string openFile(pid_t process, std::uint64_t descriptor)
     return length > 0 ? std::string(path.data(), static_cast<std::size_t>(length)) : std::string();
 }
 
-/// A path as it is given in a call, or below the open folder that it is given with.
+/// Answers the path that a call names, relative to the open folder that the call names with it.
 std::string pathIn(pid_t process, std::uint64_t folder, const std::string& path)
 {
     constexpr std::string_view ownDescriptor = "/proc/self/fd/";
@@ -207,7 +207,7 @@ public:
     Ending run()
     {
         pollfd reports{_listener, POLLIN, 0};
-        // The listener hangs up when nobody is left who could be reported.
+        // The listener reports a hang-up when no process is left.
         while (::poll(&reports, 1, -1) >= 0 && (reports.revents & POLLIN))
             answerNext();
         int status = 0;

@@ -16,7 +16,7 @@
 
 namespace sweep_tests {
 
-/// Whether documents can be renamed from folder to folder.
+/// Says whether documents can be renamed between all folders or some lie on another file system.
 enum class FileSystems { One, Several };
 
 struct Operation {
@@ -27,11 +27,11 @@ struct Operation {
 
 void PrintTo(const Operation& operation, std::ostream* stream);
 
-/// All that change the drive.
+/// Answers all operations that change the drive.
 std::vector<Operation> operations();
 
-/// What a user sees: every item by its path, a document with its content, a promise with the content behind
-/// it.
+/// The drive as a user sees it: every item by its path, a document with its content, a promise with the
+/// content behind it.
 using Drive = std::map<std::string, std::string>;
 
 /// A small drive with every kind of item, on which an operation runs.
@@ -45,19 +45,19 @@ protected:
 
     /// Runs the operation and lets one of its calls meet a fault; none for call 0.
     Ending run(const std::function<Fault(const FileCall&)>& faultFor) const;
-    /// What any program does when it starts on the drive.
+    /// Does what every program does when it starts on the drive.
     void startAgain() const;
 
-    /// It removes an item, or a document's content.
+    /// Answers whether the operation removes an item or a document's content.
     bool isRemoval() const;
     Drive seen() const;
-    /// The same without promises that say nothing beside the document that hides them.
+    /// Answers the drive without promises that add nothing to the document that hides them.
     Drive noticed() const;
-    /// What should not be there once nobody works on the drive.
+    /// Answers the files that should not exist when no program works on the drive.
     std::vector<std::string> leftovers() const;
-    /// Every content of a drive lies somewhere, under whatever name.
+    /// Answers whether every content of a drive exists somewhere, under any name.
     bool isAllThere(const Drive& drive) const;
-    /// No name shows anything but what was under some name before.
+    /// Answers whether no name shows a content that was not under some name before.
     static bool isNothingHalf(const Drive& now, const Drive& before);
     static std::string differences(const Drive& now, const Drive& before);
     static std::string read(const std::string& path);

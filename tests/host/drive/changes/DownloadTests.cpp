@@ -28,7 +28,7 @@ using platform::Error;
 using platform::FileErrorCode;
 using platform::Url;
 
-/// The local store with a fault in its fetch.
+/// The local store, whose fetch can fail.
 class FaultyStore : public LocalCloudStore {
 public:
     using LocalCloudStore::LocalCloudStore;
@@ -116,7 +116,7 @@ TEST_F(DownloadTest, PutsTheDocumentWithAllThatIsKnownOfItInThePromisesPlace)
     ASSERT_GE(heard.size(), 2U);
     EXPECT_TRUE(std::ranges::is_sorted(heard, {}, &DownloadProgress::done));
     EXPECT_EQ(heard.back(), (DownloadProgress{text.size(), text.size()}));
-    // What is here already is no error, and what was evicted comes back.
+    // A document that is already downloaded is no error, and an evicted one can be downloaded again.
     const auto again = start(item);
     dispatch->runUntilIdle();
     EXPECT_FALSE(cloud->items().evictItem(item));
@@ -140,7 +140,7 @@ TEST_F(DownloadTest, IsOneForAllWhoAskForTheDocument)
             EXPECT_EQ(*userInfo.at("url").template get<Url>(), item);
             told.push_back(items.downloadProgress(item));
         });
-    onProgress = [&] { first.reset(); }; // the other one still waits
+    onProgress = [&] { first.reset(); }; // the other listener still waits
     dispatch->runUntilIdle();
     EXPECT_EQ(heard.size(), 1U);
     EXPECT_EQ(ended, (std::vector<std::optional<Error>>(1)));
@@ -169,7 +169,7 @@ TEST_F(DownloadTest, NothingIsHeardOfACancelledDownloadAndThePromiseStays)
 {
     const std::string text(3'000'000, 'x');
     const auto item = promise("a.txt", text);
-    start(item); // not kept
+    start(item); // the handle is not kept
     dispatch->runUntilIdle();
     EXPECT_TRUE(heard.empty() && ended.empty());
     EXPECT_TRUE(isIntact("a.txt", text));

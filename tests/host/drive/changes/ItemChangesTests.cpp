@@ -72,8 +72,8 @@ protected:
         return std::any_of(fs::directory_iterator(folder), fs::directory_iterator(),
             [](const auto& entry) { return entry.path().filename().string().starts_with(".trw"); });
     }
-    /// Runs the body in a process of its own that may mount; nothing where that is not allowed. The body
-    /// answers the number of what went wrong, 0 for nothing.
+    /// Runs the body in a process of its own that may mount, and answers the body's number of failures, or
+    /// nothing where mounting is not allowed.
     static std::optional<int> withMounts(const std::function<int()>& body)
     {
         constexpr int notAllowed = 99;
@@ -212,7 +212,7 @@ TEST_F(ItemChangesTest, ReplacesAContentAndKeepsWhatBelongsToTheDocument)
     const auto before = changes().contentToReplace(item.path(), 100);
     ASSERT_TRUE(before);
     EXPECT_EQ(*before->bytes, "old");
-    // Another tag and another copy of the same bytes are no other content.
+    // Another tag and another copy of the same bytes do not change the content.
     mark(item, host::drive::itemMark::tags, "Work");
     const auto after = changes().replaceContent(item.path(), *before, "new and longer");
     ASSERT_TRUE(after);

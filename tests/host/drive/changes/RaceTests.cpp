@@ -26,8 +26,8 @@ using host::drive::PromiseRecord;
 using host::system::FileDescriptor;
 using platform::Url;
 
-/// Is asked between the look at a document and its removal or move, because a promise lies beside it: there
-/// it lets others work for as long as they like.
+/// Is called between the check of a document and its removal or move, because the document has a promise
+/// beside it. At that moment it lets other programs work for as long as they like.
 class WindowStore : public LocalCloudStore {
 public:
     using LocalCloudStore::LocalCloudStore;
@@ -39,7 +39,7 @@ public:
     std::function<void()> inTheWindow = [] {};
 };
 
-/// Saves numbered versions of a document by replacing it, and knows which of them it replaced itself.
+/// Saves numbered versions of a document by replacing it, and records which versions it replaced itself.
 class Saver {
 public:
     Saver(std::string path, std::string temporary)
@@ -64,7 +64,7 @@ public:
         }
         saved = _last;
     }
-    /// Saves from now on, on a thread of its own, until it is stopped.
+    /// Saves on a thread of its own until it is stopped.
     void start()
     {
         save();
@@ -84,7 +84,7 @@ public:
     }
     std::atomic<int> saved = 0;
     std::atomic<bool> isResting = false;
-    std::set<int> accounted; ///< of the saver's thread only
+    std::set<int> accounted; ///< used on the saver's thread only
 
 private:
     std::string _path, _temporary;
@@ -107,7 +107,7 @@ protected:
         promise.content = "other";
         writePromise(name, promise);
     }
-    /// Every version that was saved lies somewhere, or was replaced by its saver, or is one of these.
+    /// Checks that every saved version exists somewhere, was replaced by its saver, or is one of these.
     void expectNoneLost(const Saver& saver, std::set<int> accounted)
     {
         accounted.insert(saver.accounted.begin(), saver.accounted.end());
@@ -132,7 +132,7 @@ TEST_F(RaceTest, NoVersionIsDeletedThatTheDeleterHadNotSeen)
     saver.start();
     std::set<int> deleted;
     for (int round = 0; round < rounds;) {
-        // In every other round a save is sure to come between the look and the deed.
+        // In every other round a save certainly comes between the check and the operation.
         const int before = saver.saved;
         const bool isSaveAwaited = round % 2 == 0;
         store->inTheWindow = [&] {
@@ -165,7 +165,7 @@ TEST_F(RaceTest, NoVersionIsReplacedThatWasNotRead)
     std::set<int> accounted;
     int replaced = 0;
     for (int round = 0; round < rounds; ++round) {
-        // A saver that never rests is always faster than one who reads first.
+        // A saver that never rests is always quicker than a program that reads first.
         saver.isResting = round % 2 == 0;
         const auto before = changes.contentToReplace(item.path(), 100);
         if (before && changes.replaceContent(item.path(), *before, "0")) {
@@ -208,7 +208,7 @@ TEST_F(RaceTest, AFolderSwappedForALinkNeverLeadsOutside)
     for (int round = 0; round < rounds; ++round) {
         const bool isMove = round % 2 == 0;
         const auto inside = fs::is_symlink(fs::symlink_status(from)) ? link : from;
-        // Lands in the folder or, when it was swapped just now, outside under the name that is there anyway.
+        // The write goes into the folder or, when that was swapped just now, to the existing name outside.
         const FileDescriptor folder(::open(inside.c_str(), O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
         if (folder) {
             const FileDescriptor file(::openat(folder.get(), "a.txt", O_WRONLY | O_CREAT | O_CLOEXEC, 0600));

@@ -65,7 +65,7 @@ protected:
         ASSERT_EQ(_drive.cloud->items().evictItem(_drive.url(path)), std::nullopt);
     }
     void moveByOthers(const std::string& from, const std::string& to) { fs::rename(at(from), at(to)); }
-    /// Another file with the attributes of the first, as a copying program makes it.
+    /// Copies a file with its attributes, as other programs do.
     void copyByOthers(const std::string& from, const std::string& to)
     {
         const auto identifier = host::drive::documentIdentifierAt(at(from));
@@ -264,7 +264,7 @@ class DamagedIndexTests : public DocumentIdentifierTests {
 protected:
     void SetUp() override
     {
-        // Not by way of the drive's own service: its connection would live on beside the damage.
+        // The drive's own service is not used here, because its connection would stay open beside the damage.
         auto identifiers = LocalDocumentIdentifiers::create(_drive.layout(), _drive.dispatch);
         for (int i = 0; i < 40; ++i)
             _identifier = *identifiers->identify(document("F/" + std::to_string(i)));
@@ -353,7 +353,7 @@ TEST_F(DamagedIndexTests, lockedByAnotherProcess)
     EXPECT_EQ(::find(*identifiers, _identifier), _place);
 }
 
-/// Runs a body in a process of its own, which is not told of its parent's end.
+/// Runs a body in a process of its own, which is not told when its parent ends.
 template <typename Body>
 pid_t inChild(Body body)
 {
@@ -391,7 +391,7 @@ TEST_F(DocumentIdentifierTests, aWriterThatIsKilledLeavesWhatItHadNoted)
 
 TEST_F(DocumentIdentifierTests, processesThatIdentifyOneCopyAgree)
 {
-    // The connection must be closed before the process is doubled.
+    // The connection is closed before the process forks.
     const auto original = LocalDocumentIdentifiers::create(_drive.layout(), _drive.dispatch)
                               ->identify(document("a.txt"))
                               .value.value_or(0);

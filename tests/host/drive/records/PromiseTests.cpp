@@ -198,7 +198,7 @@ TEST_F(PromiseTests, theRealItemCountsWhereBothExist)
     EXPECT_FALSE(values->has(AttributeKey::DownloadingStatus));
     EXPECT_EQ(items().tagNames(url).value, std::vector<std::string>());
 
-    // A link that leads nowhere is an item, too.
+    // A broken link is an item as well.
     const auto link = _drive.writePromise("Link.pdf", record);
     _drive.writeLink("Link.pdf", "nowhere");
     EXPECT_EQ(items()

@@ -27,7 +27,7 @@ using testing::UnorderedElementsAreArray;
 using testing_support::DriveFixture;
 namespace fs = std::filesystem;
 
-/// One sample drive for all tests of the suite: making it takes a moment.
+/// All tests share one sample drive, because making it takes a moment.
 class SampleDriveTests : public testing::Test {
 protected:
     static void SetUpTestSuite()
@@ -48,7 +48,7 @@ protected:
     }
 
     static std::shared_ptr<platform::TypeRegistry> types();
-    /// Every item below the documents area by its logical path, promises by what they promise.
+    /// Answers every item below the documents area by its logical path; a promise stands for its item.
     static std::vector<Url> items();
     static platform::AttributeMap values(const Url& url);
     static std::map<std::string, std::string> contents();
@@ -141,7 +141,7 @@ TEST_F(SampleDriveTests, holdsEveryKindOfItem)
     EXPECT_EQ(linksIn, 1);
     EXPECT_EQ(linksOut, 1);
 
-    // The shared table knows every tag in use, and all eight colours are in use.
+    // The shared table contains every tag in use, and all eight colours are in use.
     std::ifstream file(_layout->keyValueStore());
     const auto table = nlohmann::json::parse(file, nullptr, false);
     ASSERT_EQ(table["PathwellTagDict"]["PathwellTagDictVersion"], 2);

@@ -22,12 +22,12 @@ using testing::HasSubstr;
 
 struct Outcome {
     int status;
-    std::string text; ///< both outputs
+    std::string text; ///< standard output and standard error
 };
 
 class AccountCommandTests : public testing::Test {
 protected:
-    /// Runs the command on a drive; `arguments` are the shell's.
+    /// Runs the command on a drive; `arguments` are written as for the shell.
     Outcome run(const std::string& arguments) const
     {
         const auto line =

@@ -54,7 +54,7 @@ TEST_F(AccountTests, tellsOfEveryChangeOfIdentityOnceAndOfNothingElse)
     EXPECT_TRUE(second && second != first);
     EXPECT_EQ(_notices, 1);
 
-    // Replaced by a rename, as careful programs write.
+    // The file is replaced by a rename, as careful programs do.
     const auto prepared = _drive.folder().write("drive/new", R"({"identity": "account-1"})");
     std::filesystem::rename(prepared, _drive.layout().account());
     _drive.settle();

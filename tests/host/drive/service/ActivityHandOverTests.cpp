@@ -34,7 +34,7 @@ Activity viewing(const std::string& bookmark, bool isEligible = true)
     return activity;
 }
 
-/// This device, and another one of the account with a state folder of its own.
+/// This device, and another device of the account with a state folder of its own.
 class HandOver : public testing::Test {
 protected:
     HandOver()
@@ -45,7 +45,7 @@ protected:
         changes = drive.notifications->observe(
             platform::Notification::ActivityOffersDidChange, [this](const auto&) { ++changeCount; });
     }
-    /// One device writes, and then the others hear of it.
+    /// Lets one device write its file, and then the other devices read it.
     void settle() const
     {
         drive.settle();
@@ -74,7 +74,7 @@ protected:
         return {device, "Laptop", "account-1", *viewing(bookmark("Documents/a.txt")),
             platform::Date{seconds * 1'000'000'000}};
     }
-    /// The documents that this device is offered, by name.
+    /// Answers the names of the documents that are offered to this device.
     std::vector<std::string> offered() const
     {
         std::vector<std::string> names;
@@ -260,7 +260,7 @@ TEST_F(HandOver, passesOverFilesThatAreNoRecords)
     std::filesystem::create_directory(folder + "/folder.json");
     settle();
     EXPECT_EQ(offered().size(), 1U);
-    // The folder may go, as when another program tidies up.
+    // The folder may disappear, for instance when another program tidies up.
     std::filesystem::remove_all(folder);
     settle();
     drive.dispatch->advance(5);

@@ -44,8 +44,8 @@ TEST_F(ContainerTests, placesAndTheirContainers)
     const struct {
         const char* path;
         bool isTop;
-        const char* identifier; // empty: in no container
-        const char* relative; // below the root of all documents; empty: outside
+        const char* identifier; // empty: it is in no container
+        const char* relative; // below the root of all documents; empty: it is outside
     } rows[] = {
         {"BrindleDefault", true, "BrindleDefault", "BrindleDefault"},
         {"BrindleDefault/Documents", false, "BrindleDefault", "BrindleDefault/Documents"},

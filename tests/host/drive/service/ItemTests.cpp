@@ -168,7 +168,7 @@ TEST_F(ItemTests, anUnreadableFolderIsNoMissingItem)
         std::filesystem::permissions(folder, std::filesystem::perms::all);
     const auto locked = _drive.url("Locked").path();
     std::filesystem::permissions(locked, std::filesystem::perms::none);
-    // Permissions do not bind the superuser, whom many build machines run as.
+    // Permissions do not stop root, as which many build machines run the tests.
     constexpr uid_t nobody = 65534;
     const bool isRoot = ::geteuid() == 0;
     if (isRoot) {

@@ -58,7 +58,7 @@ TEST_F(ThumbnailTests, madeInTheBackgroundWhenTheMainThreadAsks)
     ASSERT_EQ(::stat(entries().front().c_str(), &status), 0);
     EXPECT_EQ(status.st_mode & 0777, 0600u) << "thumbnails are private";
 
-    // Another version of the file: the old thumbnail no longer counts.
+    // The file has another version now, so the old thumbnail no longer counts.
     std::filesystem::last_write_time(
         picture.path(), std::filesystem::last_write_time(picture.path()) - std::chrono::hours(1));
     EXPECT_FALSE(thumbnails(picture));

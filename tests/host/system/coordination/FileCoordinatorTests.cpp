@@ -50,7 +50,7 @@ protected:
         std::ofstream(_folder.at(name)) << "0";
         return Url::fileURL(_folder.at(name));
     }
-    /// Adds one to the number in a file, as anyone would who has it to himself.
+    /// Adds one to the number in a file, which is correct only with exclusive access.
     static void count(LocalFileCoordinator& coordinator, const Url& url)
     {
         const auto failed = coordinator.coordinateWriting(url, WritingOptions::None, [](const Url& at) {

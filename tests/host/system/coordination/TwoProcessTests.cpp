@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// What two processes on one drive know of each other. The other process is a program of these tests.
+// These tests are about two processes on one drive. The other process is a program of these tests.
 
 #include "host/system/coordination/LocalFileCoordinator.h"
 #include "host/system/queues/GLibDispatch.h"
@@ -49,7 +49,7 @@ protected:
             .dispatch = _dispatch,
             .beforeWaiting = [this] { _dispatch->runUntilIdle(); }};
     }
-    /// Presents an item, and lets it be watched.
+    /// Presents an item and begins to watch it.
     std::shared_ptr<RecordingPresenter> present(LocalFileCoordinator& coordinator, const std::string& name)
     {
         const auto presenter = std::make_shared<RecordingPresenter>(_folder.at(name), _queue);
@@ -57,13 +57,13 @@ protected:
         _dispatch->runUntilIdle();
         return presenter;
     }
-    /// Lets events come and time pass: a second is enough for everything to be told.
+    /// Delivers events and lets time pass. A second is enough for every notice.
     void settle(double seconds = 1)
     {
         while (g_main_context_iteration(nullptr, FALSE)) { }
         _dispatch->advance(seconds);
     }
-    /// Sends a command whose words that hold a slash are names in the test's folder.
+    /// Sends a command, whose words with a slash are names in the test's folder.
     std::string ask(const std::string& command) { return _peer.ask(inFolder(command)); }
     std::string inFolder(const std::string& text) const
     {
@@ -119,7 +119,7 @@ TEST_F(TwoProcessTest, aHolderThatHangsIsNotWaitedForForever)
     }
     EXPECT_EQ(_log->count("WARNING Cannot lock " + item.path() + ": Device or resource busy"), 2U);
 
-    // A killed one has nothing any more.
+    // A killed process holds no lock any more.
     _peer.signal(SIGKILL);
     EXPECT_EQ(_peer.receive(), "");
     EXPECT_FALSE(coordinator.coordinateWriting(item, WritingOptions::None, [](auto&) {}));
@@ -177,7 +177,7 @@ TEST_P(PresenterOfAnotherProcess, isToldOnceAndFollowsItsItem)
     for (const auto& heard : GetParam().heard)
         expected.push_back(inFolder(heard));
     EXPECT_THAT(presenter->heard, ElementsAreArray(expected));
-    // Where the item is now, it is watched too.
+    // The item is watched in its new place as well.
     presenter->heard.clear();
     const auto last = expected.empty() ? std::string() : expected.back();
     const auto place = last.starts_with("moved to ") ? last.substr(9) : presenter->url.path();
@@ -264,7 +264,7 @@ TEST_F(TwoProcessTest, whatThisProcessWritesIsNotToldTwice)
     settle();
     EXPECT_THAT(item->heard, ElementsAre("changed", "moves to " + moved.path(), "moved to " + moved.path()));
     EXPECT_THAT(folder->heard, ElementsAre("changed", "changed"));
-    // The presenter still says the old place; what is watched is the new one.
+    // The presenter still answers the old place, but the new one is watched.
     item->heard.clear();
     EXPECT_EQ(ask("write drive/other/m"), "done");
     settle();
@@ -305,7 +305,7 @@ TEST_F(TwoProcessTest, nobodyIsToldWhoHasLeft)
     EXPECT_THAT(removed->heard, IsEmpty());
     EXPECT_THAT(kept->heard, ElementsAre("changed"));
 
-    // The coordinator ends while events wait and while a look waits.
+    // The coordinator is destroyed while events and a look are pending.
     EXPECT_EQ(ask("write drive/sub/deep/a.txt"), "done");
     while (g_main_context_iteration(nullptr, FALSE)) { }
     _dispatch->runUntilIdle();
@@ -316,7 +316,7 @@ TEST_F(TwoProcessTest, nobodyIsToldWhoHasLeft)
     EXPECT_EQ(_dispatch->pendingCount(), 0U);
 }
 
-/// Counts what it hears, on any thread, and wakes the main loop.
+/// Counts its notices on any thread, and wakes the main loop.
 class CountingPresenter : public platform::FilePresenter {
 public:
     CountingPresenter(Url url, std::shared_ptr<platform::OperationQueue> queue)
@@ -364,7 +364,7 @@ TEST_F(TwoProcessTest, everybodyIsHeardOnRealThreads)
         EXPECT_EQ(ask("append drive/sub/deep/a.txt"), "done");
     writer.join();
     visitor.join();
-    // Each own write is told of; then what the other process does is, sooner or later.
+    // Each write of this process is reported, and sooner or later so is the write of the other process.
     while (presenter->changes < rounds)
         g_main_context_iteration(nullptr, TRUE);
     for (const int before = presenter->changes; presenter->changes == before;) {

@@ -14,7 +14,7 @@ using testing_support::TemporaryDirectory;
 
 namespace {
 
-/// A picture whose left half is red and whose right half is blue.
+/// Answers a picture whose left half is red and whose right half is blue.
 std::string twoColors(int width, int height)
 {
     std::string file = "P6 " + std::to_string(width) + ' ' + std::to_string(height) + " 255\n";
@@ -77,7 +77,7 @@ TEST(ImageLoader, SaysWhyAPictureCannotBeShown)
 TEST(ImageLoader, ReadsTheFramesOfAnAnimation)
 {
     using namespace std::string_literals;
-    // One pixel that is black for 200 milliseconds and white for 10.
+    // The animation shows one pixel, black for 200 milliseconds and white for 10.
     const auto frame = [](char delay, char color) {
         return "\x21\xF9\4\0"s + delay + "\0\0\0"s + "\x2C\0\0\0\0\1\0\1\0\0\2\2"s + color + "\1\0"s;
     };
@@ -98,7 +98,7 @@ TEST(ImageLoader, ReadsTheFramesOfAnAnimation)
     const auto cancelled = loader.loadPicture(path, {}, [] { return true; });
     EXPECT_EQ(cancelled.error->code(), static_cast<int>(ImageErrorCode::Cancelled));
 
-    // Broken off within its second frame.
+    // The file is truncated within its second frame.
     const auto half = loader.loadPicture(folder.write("half.gif", gif.substr(0, gif.size() - 6)), {}, never);
     ASSERT_TRUE(half);
     EXPECT_TRUE(half->breaksOff);

@@ -21,7 +21,7 @@ using host::system::LogSettings;
 
 namespace {
 
-/// Standard error as a file, while it lives.
+/// Redirects standard error to a file while it lives.
 class StandardErrorAsFile {
 public:
     explicit StandardErrorAsFile(const std::string& path)
@@ -50,7 +50,7 @@ protected:
         installLogSink(nullptr);
         setLogLevel(LogLevel::Debug);
     }
-    /// What the work logs, line by line.
+    /// Answers the lines that the work logs.
     std::vector<std::string> logged(const std::function<void()>& work)
     {
         const auto path = directory.at("log");

@@ -63,7 +63,7 @@ TEST_F(TypeRegistryTest, ConformanceGoesThroughEveryParent)
     EXPECT_TRUE(types.conformsTo("public.pages-document", "public.package"));
     EXPECT_FALSE(types.conformsTo("what.ever", "public.data"));
     EXPECT_TRUE(types.conformsTo("what.ever", "what.ever"));
-    // Types that only the MIME database knows follow its own tree.
+    // Types that only the MIME database has follow its own tree.
     EXPECT_TRUE(types.conformsTo("dyn.mime.text/x-adasrc", "public.text"));
     EXPECT_TRUE(types.conformsTo("dyn.mime.application/x-fictionbook+xml", "public.xml"));
     EXPECT_TRUE(types.conformsTo("dyn.mime.image/x-tga", "public.image"));

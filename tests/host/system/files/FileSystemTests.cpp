@@ -25,7 +25,8 @@ using Continue = FileSystem::Continue;
 
 class FileSystemTest : public testing::Test {
 protected:
-    /// Everything below the folder as "path:type" relative to it, and the errors' paths with their codes.
+    /// Answers everything below the folder as "path:type" relative to it, and the errors' paths with their
+    /// codes.
     std::vector<std::string> enumerate(const std::string& path)
     {
         std::vector<std::string> found;
@@ -139,7 +140,7 @@ TEST_F(FileSystemTest, EnumerationStopsWhenAskedAndReportsFoldersThatCannotBeRea
         Url::fileURL(directory.at("top")), [&](auto&&...) { return ++entries, Continue::No; },
         [&](auto&&...) { return Continue::Yes; });
     EXPECT_EQ(entries, 1);
-    // A folder that turns into a link while it is walked is not entered.
+    // A folder that is replaced by a link during the walk is not entered.
     bool swapped = false;
     files.enumerateDeeply(
         Url::fileURL(directory.at("top")),
@@ -166,7 +167,7 @@ TEST_F(FileSystemTest, WalksThousandsOfLevelsWithFewDescriptors)
     constexpr int depth = 1200;
     int folder = ::open(directory.path().c_str(), O_RDONLY | O_DIRECTORY);
     for (int i = 0; i < depth; ++i) {
-        // Two at each level, so that the walk comes back to every one of them.
+        // Each level has two folders, so that the walk returns to every level.
         ASSERT_EQ(::mkdirat(folder, "level", 0700) | ::mkdirat(folder, "other", 0700), 0);
         const int next = ::openat(folder, "level", O_RDONLY | O_DIRECTORY);
         ::close(folder);

@@ -60,13 +60,13 @@ TEST_F(UserDefaultsTest, KeepsValuesBetweenRunsAndWritesManyChangesAtOnce)
         EXPECT_FALSE(std::filesystem::exists(path)); // nothing is written on the caller's thread
         EXPECT_EQ(dispatch->pendingCount(), 1U);
         dispatch->runUntilIdle();
-        defaults->remove("gone"); // still waits when the object ends
+        defaults->remove("gone"); // still pending when the object is destroyed
     }
     const auto again = open();
     EXPECT_EQ(again->data("token"), token);
     EXPECT_EQ(again->data("gone"), std::nullopt);
     const auto files = std::distance(std::filesystem::directory_iterator(directory.path()), {});
-    EXPECT_EQ(files, 1); // no temporary file stays
+    EXPECT_EQ(files, 1); // no temporary file is left
 }
 
 TEST_F(UserDefaultsTest, DamagedFileIsKeptAsideAndNamedInTheLog)
@@ -91,7 +91,7 @@ TEST_F(UserDefaultsTest, FileThatMustNotBeTouchedIsNotOverwritten)
     open()->setData("token", bytes("x"));
     EXPECT_EQ(content(path), newer);
     std::filesystem::remove(path);
-    std::filesystem::create_directory(path); // readable for nobody, the superuser included
+    std::filesystem::create_directory(path); // nobody can read it as a file, not even root
     open()->setData("token", bytes("x"));
     EXPECT_TRUE(std::filesystem::is_directory(path));
     EXPECT_EQ(log->lines().size(), 2U);
@@ -181,7 +181,7 @@ TEST(JsonKeyedArchiver, SurvivesEveryCutAndEveryFlippedBit)
         damaged[bit / 8] ^= std::byte(1 << (bit % 8));
         refused += !archiver.unarchive(damaged);
     }
-    EXPECT_GT(refused, 0U); // a flipped letter of a text cannot be told; broken syntax must be
+    EXPECT_GT(refused, 0U); // a flipped letter of a text cannot be noticed, but broken syntax must be
 }
 
 } // namespace

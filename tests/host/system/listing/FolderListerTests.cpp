@@ -45,7 +45,7 @@ protected:
         return lister.list(Url::fileURL(path, PathKind::Directory), std::move(extras), grouping,
             [this](Snapshot snapshot) { updates.push_back(std::move(snapshot)); });
     }
-    /// Lists a folder to its end; the listing then ends.
+    /// Lists a folder to its end and then destroys the listing.
     Snapshot listOnce(const std::string& path, std::vector<FolderSnapshot::ExtraItem> extras = {})
     {
         const auto listing = list(path, std::move(extras));
@@ -53,7 +53,7 @@ protected:
         EXPECT_FALSE(updates.empty());
         return updates.empty() ? nullptr : updates.back();
     }
-    /// Lets the kernel's notices and the virtual clock run until an update came.
+    /// Runs the kernel's notices and the virtual clock until an update has come.
     void waitForUpdate()
     {
         const auto deadline = std::chrono::steady_clock::now() + 30s;
@@ -159,7 +159,8 @@ TEST_F(FolderListerTest, FoldersThatCannotBeReadFailWithTheReason)
 
 class LargeFolderTest : public FolderListerTest {
 protected:
-    /// Empty files with names in no order; hard links of one, so that they are made quickly.
+    /// Makes empty files with names in random order. They are hard links of one file, so that making them is
+    /// quick.
     void fill(int count, const std::string& folder = "large")
     {
         const auto first = directory.write(folder + "/name 0", "");
@@ -182,7 +183,7 @@ TEST_F(LargeFolderTest, FirstRowsAreTheFirstOfTheCompleteListWhicheverIsSeen)
     fill(9000);
     const auto listing = list(directory.at("large"));
     dispatch->runUntilIdle();
-    // Both came in one turn of the virtual loop, so only the complete list was delivered.
+    // Both snapshots came in one turn of the virtual loop, so only the complete list was delivered.
     ASSERT_EQ(updates.size(), 1U);
     EXPECT_EQ(updates[0]->count(), 9000U);
     expectNaturalOrder(updates[0]);
@@ -192,7 +193,7 @@ TEST_F(LargeFolderTest, FolderThatTurnsUnreadableMidwayFailsWithWhatWasRead)
 {
     fill(9000);
     const auto listing = list(directory.at("large"));
-    // Runs after the first block was read and before the second is.
+    // This runs after the first block was read and before the second one is.
     dispatch->mainQueue()->async([this] { std::filesystem::remove_all(directory.at("large")); });
     dispatch->runUntilIdle();
     ASSERT_EQ(updates.size(), 1U);
@@ -220,7 +221,7 @@ TEST_F(LargeFolderTest, IsReadWholeWhereLooksAtItsNamesWouldCostMore)
     EXPECT_EQ(updates.back()->revision()->inserted, std::vector<std::uint32_t>{6000});
     expectNaturalOrder(updates.back());
 
-    // The names of what has gone are kept until they are most of what is kept.
+    // The names of removed items stay in memory until they take more of it than the others.
     const auto longName = [](int i) { return "x/" + std::string(240, 'n') + std::to_string(i); };
     directory.write("x/a", "");
     const auto other = list(directory.at("x"));
@@ -260,7 +261,7 @@ TEST_F(LargeFolderTest, RealThreadsGiveTheSameList)
         updates.push_back(std::move(snapshot));
     });
     run([&] { return !updates.empty() && updates.back()->stage() == ListingStage::Complete; });
-    // Listings that end at any moment never call again.
+    // Listings that are destroyed at any moment never call again.
     for (int i = 0; i < 20; ++i) {
         listing = threaded.list(url, {}, platform::FolderGrouping::FoldersFirst,
             [](auto) { ADD_FAILURE() << "called after its end"; });

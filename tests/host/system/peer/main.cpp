@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// The other process of a test: does to files what each line of its input says, and answers each with a line.
-// The first argument is the lock file that both processes share.
+// This program is the other process of a test. It performs the operation on each line of its input and
+// answers each with a line. Its first argument is the lock file that both processes share.
 
 #include "host/system/coordination/LocalFileCoordinator.h"
 #include "host/system/files/AtomicWrite.h"
@@ -39,7 +39,7 @@ void append(const std::string& path)
     std::ofstream(path, std::ios::app) << "more";
 }
 
-/// Keeps an item until the next line of the input.
+/// Holds an item until the next line of the input.
 void hold(const Url&)
 {
     answer("holding");
@@ -47,7 +47,7 @@ void hold(const Url&)
     std::getline(std::cin, line);
 }
 
-/// A move that is right only while nobody else touches the item.
+/// Moves in steps, which is correct only while no other program touches the item.
 bool moveInSteps(const std::string& from, const std::string& to)
 {
     if (!fs::exists(from))
@@ -97,7 +97,7 @@ const std::map<std::string, Command> commands = {
             answer(to.coordinateWriting(Url::fileURL(words[1]), WritingOptions::ForDeleting,
                 [](const Url& at) { fs::remove_all(at.path()); }));
         }},
-    // Programs that know nothing of coordination.
+    // These act like programs without coordination.
     {"write", [](auto&, auto& words) { append(words[1]), answer("done"); }},
     {"rename", [](auto&, auto& words) { fs::rename(words[1], words[2]), answer("done"); }},
     {"delete", [](auto&, auto& words) { fs::remove_all(words[1]), answer("done"); }},

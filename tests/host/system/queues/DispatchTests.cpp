@@ -19,7 +19,7 @@ using testing_support::VirtualDispatch;
 
 namespace {
 
-/// A dispatch and the way to let its work happen.
+/// A dispatch, and a function that runs its work.
 struct Driver {
     std::shared_ptr<Dispatch> dispatch;
     std::function<void(const std::function<bool()>&)> runUntil;
@@ -29,7 +29,7 @@ void iterateUntil(const std::function<bool()>& done)
 {
     const auto deadline = std::chrono::steady_clock::now() + 30s;
     while (!done() && std::chrono::steady_clock::now() < deadline) {
-        // A work on another thread does not wake this loop, so one that only waits must not block.
+        // Work on another thread does not wake this loop, so a loop that only waits must not block.
         if (!g_main_context_iteration(nullptr, FALSE))
             std::this_thread::yield();
     }
@@ -49,7 +49,7 @@ Driver virtualDriver()
             }};
 }
 
-/// What platform/Dispatch.h promises, for the host's queues and for those that tests use.
+/// Checks the promises of platform/Dispatch.h for the host's queues and for the tests' own ones.
 class DispatchContract : public testing::TestWithParam<Driver (*)()> {
 protected:
     void runUntil(const std::function<bool()>& done)
@@ -134,7 +134,7 @@ TEST_P(DispatchContract, WorkOfADestroyedQueueNeverRunsAndLetsGoOfWhatItHolds)
     auto held = std::make_shared<int>();
     std::weak_ptr<int> watched = held;
     bool ran = false, later = false;
-    // The first work destroys the queue that it runs on: nothing may wait for itself.
+    // The first piece of work destroys the queue on which it runs, so nothing may wait for itself.
     auto queue = dispatch.makeSerialQueue("short-lived");
     std::promise<void> bothAreIn;
     std::atomic<bool> isGone = false;
@@ -158,7 +158,7 @@ TEST(GLibDispatch, OperationsRunAtTheSameTime)
     std::latch both(2), done(2);
     for (int i = 0; i < 2; ++i)
         queue->addOperation([&] {
-            both.arrive_and_wait(); // never passes when the second waits for the first to end
+            both.arrive_and_wait(); // never returns when the second operation waits for the first to end
             done.count_down();
         });
     done.wait();
@@ -201,7 +201,7 @@ TEST(GLibDispatch, EndsWhileWorkWaitsEverywhere)
     dispatch->after(1h, dispatch->mainQueue(), [held] {});
     iterateUntil([&] { return began.load(); });
     dispatch.reset();
-    serial->async([held] {}); // an orphan takes work and never runs it
+    serial->async([held] {}); // a queue without its dispatch takes work and never runs it
     EXPECT_LE(held.use_count(), 4);
 }
 

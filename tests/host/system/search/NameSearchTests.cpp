@@ -97,7 +97,7 @@ protected:
             results = std::move(news);
         });
     }
-    /// The items found, below the temporary folder; a promise has an asterisk.
+    /// Answers the items found, by their paths below the temporary folder; a promise has an asterisk.
     Names search_(const std::string& query)
     {
         session->setQuery(query);
@@ -147,7 +147,7 @@ TEST_F(NameSearchTests, FollowsChangesWhileItGoesOn)
     folder.write("a/two/other.txt", "");
     begin({"a"});
     EXPECT_THAT(search_("plan"), ElementsAre("a/one/plan 1.txt"));
-    // Folders that settled are not read again.
+    // A folder that was not modified lately is not read again.
     for (const auto* each : {"a", "a/one", "a/two"})
         std::filesystem::last_write_time(
             folder.at(each), std::filesystem::file_time_type::clock::now() - std::chrono::hours(1));

@@ -9,7 +9,7 @@
 
 namespace testing_support {
 
-/// A process that is told line by line what to do and answers each line with one. It ends with this object.
+/// A process that gets its orders line by line and answers each with one line. It ends with this object.
 class PeerProcess {
 public:
     PeerProcess(const std::string& program, const std::string& argument);
@@ -18,7 +18,7 @@ public:
     PeerProcess& operator=(const PeerProcess&) = delete;
 
     void send(const std::string& line);
-    /// Waits for the next line; empty when the process has ended.
+    /// Waits for the next line. Answers an empty text when the process has ended.
     std::string receive();
     std::string ask(const std::string& line);
     void signal(int number);

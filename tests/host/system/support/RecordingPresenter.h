@@ -14,7 +14,7 @@
 
 namespace testing_support {
 
-/// Writes down what it hears, with the name of the item at that time; answers as it is told to.
+/// Records its calls with the item's name at that time, and answers as the test says.
 class RecordingPresenter : public platform::FilePresenter {
 public:
     RecordingPresenter(const std::string& path, std::shared_ptr<platform::OperationQueue> queue)
@@ -57,7 +57,7 @@ private:
         if (isSilent)
             return kept.push_back(std::move(completion));
         completion(answer);
-        completion(platform::Error(platform::errorDomain::system, EIO)); // a second answer counts for nothing
+        completion(platform::Error(platform::errorDomain::system, EIO)); // a second answer does not count
     }
     std::shared_ptr<platform::OperationQueue> _queue;
 };

@@ -23,7 +23,7 @@ namespace {
 
 constexpr const char* variables[] = {"LANGUAGE", "LC_ALL", "LC_MESSAGES", "LC_TIME", "LC_COLLATE", "LANG"};
 
-/// Gives each test an environment without languages, and the old one back.
+/// Gives each test an environment without languages, and restores the old one.
 class LocaleTest : public testing::Test {
 protected:
     LocaleTest()
@@ -104,7 +104,7 @@ TEST_F(LocaleTest, OtherLanguagesWithoutTheirLocaleInstalled)
     EXPECT_EQ(localized("The name “%@” is already taken.", {"a"}), "Der Name „a“ ist bereits vergeben.");
     EXPECT_EQ(localized("The name “%@” is already taken.", {"a\u202Efdp.exe"}),
         "Der Name „a\uFFFDfdp.exe“ ist bereits vergeben.");
-    // A language without a catalogue reads English, from left to right.
+    // A language without a catalogue reads English texts from left to right.
     install({"he_IL:en", "he_IL"});
     EXPECT_EQ(localizedPlural(".DICT.ITEMS.%d", {std::int64_t{1}}), "1 item");
     EXPECT_FALSE(services().localization().isRightToLeft());
