@@ -19,7 +19,7 @@ using host::system::SystemError;
 
 namespace {
 
-/// Root may write anywhere and still cannot remove what is marked so.
+/// Root passes every check of permissions, so the attributes that forbid a removal are checked here.
 SystemError checkMarks(const FileDescriptor& folder, const char* name, int flags)
 {
     struct statx found;
@@ -69,14 +69,15 @@ public:
     SystemError leaveFolder(const FileDescriptor& parent, const std::string& name) override
     {
         auto failed = SystemError::unless(::unlinkat(parent.get(), name.c_str(), AT_REMOVEDIR) == 0, name);
-        // Why a folder is not empty was noted before.
+        // The reason why a folder is not empty was noted before.
         return note(failed.is(ENOTEMPTY) && failure ? failure : failed);
     }
     bool hasBegun = false;
     SystemError failure; ///< the first one
 
 private:
-    /// Before anything is gone the first failure ends the walk; later ones are left behind.
+    /// The first failure ends the walk unless something was already removed. After that the walk goes on and
+    /// leaves out the items that fail.
     SystemError note(const SystemError& failed)
     {
         if (!failed)

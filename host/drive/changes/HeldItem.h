@@ -13,17 +13,17 @@ namespace host::drive {
 
 class CloudStore;
 
-/// An item that was taken out of its folder under a name that nobody else uses, so that what is looked at is
-/// what is then removed. It is put back at the end unless it was removed, and at the next start when the
-/// process was killed meanwhile (Recovery).
+/// An item that was renamed out of its folder to a private name, so that the item that is checked is the one
+/// that is then removed. The destructor puts it back unless it was removed. If the process is killed, the
+/// next start puts it back (Recovery).
 ///
-/// Removing it is all or nothing, for a folder too. Whether everything in it may be removed is asked first
-/// (Discarding); then it gets the name of a removal that is decided. Until its first part is gone any failure
-/// puts the whole back.
+/// Removing it is all or nothing, for a folder too. First it is checked whether everything in it may be
+/// removed (Discarding); then it gets the name of a decided removal. Until its first part is removed, any
+/// failure puts the whole item back.
 class HeldItem {
 public:
-    /// Takes the item away; `name` is its own or its promise's. `copy` is where a whole copy of it lies, if
-    /// it is removed because it was copied.
+    /// Renames the item away; `name` is its own or its promise's. `copy` is the path of a whole copy of it,
+    /// if it is removed because it was copied.
     static system::SystemResult<HeldItem> take(const DriveLayout& layout, const DriveEntry& entry,
         const std::string& name, const std::string& copy = {});
 
@@ -31,13 +31,13 @@ public:
     HeldItem& operator=(HeldItem&&) = delete;
     ~HeldItem();
 
-    /// Where it is now.
+    /// The folder and the name under which it is held.
     const system::FileDescriptor& folder() const { return _isAside ? _aside : _origin; }
     const std::string& name() const { return _name; }
 
-    /// Removes it for good, with the contents behind its promises where a store is given. All or nothing:
-    /// after a failure it is put back whole. What cannot be removed once the first part is gone is
-    /// removed at the next start; the item counts as removed then.
+    /// Removes it for good and, when a store is given, the contents behind its promises. It is all or
+    /// nothing: after a failure the whole item was put back. Parts that cannot be removed after the first one
+    /// was are removed at the next start; the item counts as removed then.
     system::SystemError remove(CloudStore* store);
 
 private:
@@ -45,10 +45,11 @@ private:
     system::SystemError decide(const char* prefix);
     void putBack();
 
-    system::FileDescriptor _origin, _aside; ///< its folder; the private one
+    system::FileDescriptor _origin, _aside; ///< the item's folder; the private folder
     std::optional<WorkRecord> _record;
     std::string _originName, _name, _path;
-    bool _isAside = false; ///< in the private folder; else beside its old name, on another file system
+    bool _isAside =
+        false; ///< held in the private folder; else beside its old name, because it is on another file system
     bool _isThere = false;
 };
 

@@ -7,8 +7,8 @@
 
 namespace host::drive {
 
-/// Contents as files of the drive's own `cloud/` folder, which is made when something is stored. A name that
-/// could lead elsewhere is no content's (ENOENT).
+/// Stores contents as files in the drive's own `cloud/` folder, which is made with the first content. A name
+/// that could lead out of the folder is refused (ENOENT).
 class LocalCloudStore : public CloudStore {
 public:
     explicit LocalCloudStore(DriveLayout layout)

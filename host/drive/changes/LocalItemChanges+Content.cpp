@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// Reading a document to replace its content later, and replacing it.
+// This file reads a document whose content is to be replaced, and replaces it.
 
 #include "host/drive/changes/LocalItemChanges.h"
 #include "host/drive/changes/NewFile.h"
@@ -30,7 +30,7 @@ namespace {
 
 constexpr int readFlags = O_RDONLY | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY;
 
-/// A document of the drive that is open, and what it was then.
+/// A document of the drive that is open, and its status when it was opened.
 struct OpenDocument {
     DriveEntry entry;
     FileDescriptor file;
@@ -52,19 +52,19 @@ Result<OpenDocument> openDocument(const DriveLayout& layout, const std::string& 
     return document;
 }
 
-/// Whether both the document and its folder may be written, and else why not.
+/// Answers an error unless both the document and its folder may be written.
 SystemError checkWritable(const OpenDocument& document)
 {
     const int folder = document.entry.folder.get();
     const bool isWritable = ::faccessat(folder, document.entry.name.c_str(), W_OK, AT_EACCESS) == 0
         && ::faccessat(folder, ".", W_OK, AT_EACCESS) == 0;
-    // The one who may write everything still respects what is meant to stay as it is.
+    // Root may write every file, but a read-only document is respected all the same.
     if (isWritable && (document.found.st_mode & 0222) == 0)
         return {EACCES, document.entry.name};
     return SystemError::unless(isWritable, document.entry.name);
 }
 
-/// Reads from the start; ECANCELED when there is less by now.
+/// Reads a file from its start. Answers ECANCELED when it became shorter meanwhile.
 SystemResult<std::string> readBytes(const FileDescriptor& file, std::size_t size)
 {
     std::string bytes(size, '\0');
@@ -80,12 +80,12 @@ SystemResult<std::string> readBytes(const FileDescriptor& file, std::size_t size
     return bytes;
 }
 
-/// ECANCELED when a document does not hold these bytes.
+/// Answers ECANCELED when a document does not hold these bytes.
 SystemError compareContent(const OpenDocument& document, const FileContent& before)
 {
     if (versionOf(document.found) == before.version)
         return {};
-    // Tags, a new name or a new copy of the same content are no change of it.
+    // New tags, a new name or a new copy of the same content do not count as a change of content.
     if (static_cast<std::size_t>(document.found.st_size) != before.bytes->size())
         return {ECANCELED, document.entry.name};
     const auto bytes = readBytes(document.file, before.bytes->size());
@@ -94,7 +94,7 @@ SystemError compareContent(const OpenDocument& document, const FileContent& befo
     return *bytes == *before.bytes ? SystemError() : SystemError(ECANCELED, document.entry.name);
 }
 
-/// Access and attributes of another document.
+/// Copies access rights and attributes of another document.
 SystemError takeOver(const NewFile& file, const OpenDocument& from, std::string_view except)
 {
     TRW_TRY(copyAttributes(from.file, file.descriptor(), except));
@@ -114,7 +114,7 @@ SystemResult<ItemVersion> replaceBytes(const DriveLayout& layout, const OpenDocu
     return file->replace(layout, document.entry, versionOf(document.found));
 }
 
-/// Makes a document with access and attributes of another one, where that can be had.
+/// Makes a document with the access rights and attributes of another one, if that can be opened.
 SystemError addFile(
     const DriveLayout& layout, const DriveEntry& entry, const std::string& like, std::string_view content)
 {
@@ -123,7 +123,7 @@ SystemError addFile(
     if (!file)
         return file.error;
     TRW_TRY(file->write(content));
-    // It is a document of its own: the other one keeps the identifier.
+    // The new document is one of its own, so the identifier stays with the other one.
     if (const auto model = openDocument(layout, like))
         TRW_TRY(takeOver(*file, *model, itemMark::documentIdentifier));
     return file->publish(entry, entry.name);

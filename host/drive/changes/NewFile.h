@@ -11,15 +11,15 @@
 
 namespace host::drive {
 
-/// A file in the making, in the folder where it will lie, under a private name until it is whole. What is not
-/// published goes at the end, and at the next start when the process was killed meanwhile.
+/// A file that is being written in its final folder, under a private name until it is whole. A file that is
+/// not published is removed by the destructor, or at the next start if the process was killed.
 ///
-/// It replaces a document by exchanging the two names in one step and comparing what came out with what was
-/// expected: when another program has saved meanwhile, the names are exchanged again, and nothing has
+/// It replaces a document by exchanging the two names in one step and comparing the old document with the
+/// expected version. When another program has saved meanwhile, the names are exchanged back, and nothing has
 /// changed.
 class NewFile {
 public:
-    /// Makes it, empty, beside an entry.
+    /// Creates the empty file beside an entry.
     static system::SystemResult<NewFile> create(const DriveLayout& layout, const DriveEntry& entry);
 
     NewFile(NewFile&& other) noexcept;
@@ -29,12 +29,12 @@ public:
     const system::FileDescriptor& descriptor() const { return _file; }
     /// Writes a text.
     system::SystemError write(std::string_view text) const;
-    /// Syncs the file and gives it its name; nothing is replaced (EEXIST). The record for the next
-    /// start stays until the end.
+    /// Syncs the file and gives it its name. It never replaces a file (EEXIST). The record for the next start
+    /// stays until the end.
     system::SystemError publish(const DriveEntry& entry, const std::string& name);
-    /// Syncs the file and gives it the name of one that is `expected`, which goes for good. Answers
-    /// the version that lies there now, ECANCELED when another one had taken its place; after a failure
-    /// nothing has changed. After a kill in between, both are there: one of them in the trash.
+    /// Syncs the file and gives it the name of the `expected` version, which is removed for good. Answers the
+    /// new version, or ECANCELED when another version had taken the name; after a failure nothing has
+    /// changed. After a kill in between both files exist, one of them in the trash.
     system::SystemResult<platform::ItemVersion> replace(
         const DriveLayout& layout, const DriveEntry& entry, const platform::ItemVersion& expected);
 
@@ -42,13 +42,13 @@ private:
     NewFile() = default;
     system::SystemError takeHeldName(const DriveLayout& layout, const DriveEntry& entry);
     system::SystemError exchange(const DriveEntry& entry) const;
-    /// This file's version, when what was taken out is `expected`; else ECANCELED.
+    /// Answers this file's version when the replaced file is `expected`, else ECANCELED.
     system::SystemResult<platform::ItemVersion> checkExchanged(const platform::ItemVersion& expected) const;
     bool isUnderPrivateName() const;
 
     std::optional<WorkRecord> _record;
     system::FileDescriptor _folder, _file;
-    std::string _name; ///< empty once it is published
+    std::string _name; ///< empty once the file is published
 };
 
 } // namespace host::drive

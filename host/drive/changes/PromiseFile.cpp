@@ -32,7 +32,8 @@ SystemResult<std::string> contentOfPromise(const FileDescriptor& folder, const s
     const auto text =
         host::system::readWholeFile(folder, promiseName, PromiseRecord::maximumFileSize, promiseName);
     const auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
-    // What is too large is damaged; nothing else that the system says means that nothing lies behind it.
+    // A promise that is too large counts as damaged. Any other error of the system does not mean that there
+    // is no content.
     const bool hasFailed =
         text.error && text.error->domain() == platform::errorDomain::system && text.error->code() != EFBIG;
     if (hasFailed)
@@ -52,7 +53,8 @@ void dropRedundantPromise(const DriveEntry& entry, CloudStore& store)
     const auto& content = promise->content;
     if (!content.empty() && store.holdsOtherThan(content, document))
         return;
-    // The content first: a promise with nothing behind it is found again, a content without a promise is not.
+    // The content is removed first: a promise without a content can still be found again, but a content
+    // without a promise cannot.
     if (content.empty() || !store.remove(content))
         ::unlinkat(entry.folder.get(), entry.promiseName().c_str(), 0);
 }

@@ -10,16 +10,17 @@
 
 namespace host::drive {
 
-/// The promise of an entry as it lies on the disk. Errors: the system's, or CloudErrorCode::DamagedRecord.
+/// Reads the promise of an entry from the disk. Errors: the system's, or CloudErrorCode::DamagedRecord.
 platform::Result<PromiseRecord> readPromise(const DriveEntry& entry);
 
-/// The name of the content behind a promise file of an open folder; it is empty when the promise names none
-/// or is damaged. It fails with what could not be read.
+/// Answers the name of the content behind a promise file in an open folder. The name is empty when the
+/// promise names none or is damaged. An error means that the file could not be read.
 system::SystemResult<std::string> contentOfPromise(
     const system::FileDescriptor& folder, const std::string& promiseName);
 
-/// Removes the promise beside a document when it adds nothing: nothing lies behind it, or what the document
-/// holds as well. Any other is an item that nobody has seen since the document hides it, and stays.
+/// Removes the promise beside a document when it adds nothing: when it has no content, or the same content as
+/// the document. Any other promise stays, because it is an item that the document hides and nobody has seen
+/// since.
 void dropRedundantPromise(const DriveEntry& entry, CloudStore& store);
 
 } // namespace host::drive

@@ -12,10 +12,10 @@ namespace host::drive {
 
 class CloudStore;
 
-/// Puts right what processes that were killed left behind: items under a private name come back, removals
-/// and moves that were decided are finished, copies that are not whole go. Never removes what is not known to
-/// lie elsewhere as well, or to have been asked to go. What cannot come back, because its name is taken or
-/// its folder is gone, goes to the trash and is named in the log.
+/// Repairs the drive after processes that were killed. Items under a private name are put back, decided
+/// removals and moves are finished, and incomplete copies are removed. It removes only items that are known
+/// to exist elsewhere or whose removal was requested. An item that cannot be put back, because its name is
+/// taken or its folder is gone, is moved to the trash and named in the log.
 class Recovery {
 public:
     Recovery(DriveLayout layout, CloudStore& store)
@@ -23,7 +23,7 @@ public:
         , _store(store)
     {
     }
-    /// Any thread, at any time: what living processes work on is left alone.
+    /// Any thread, at any time, because it leaves the work of living processes alone.
     void run();
 
 private:

@@ -12,34 +12,36 @@
 
 namespace host::drive {
 
-/// What a process writes down before it gives an item, or a copy of one, a private name, so that the next
-/// start can put things right if it is killed. The record goes when this is destroyed; while this lives it is
+/// A process writes a record before it gives an item, or a copy of one, a private name, so that the next
+/// start can repair the drive if the process is killed. The destructor removes the record. Until then it is
 /// locked, so that others can tell that its process lives.
 class WorkRecord {
 public:
-    /// Absolute paths of names on disk, for a promise its file's.
+    /// Absolute paths of names on disk. For a promise they are those of its file.
     struct Places {
-        std::string item; ///< where the item belongs
-        std::string working; ///< the private name: of the item itself (heldPrefix) or of a copy
-        std::string copy; ///< where a whole copy of the item is put; empty: nowhere
+        std::string item; ///< the item's own place
+        std::string working; ///< the private name of the item itself (heldPrefix) or of a copy
+        std::string copy; ///< the place of a whole copy of the item; empty: none
     };
 
-    /// An item that was taken out of its folder and will be put back.
+    /// The prefix of an item that was taken out of its folder and will be put back.
     static constexpr const char* heldPrefix = ".trwheld-";
-    /// An item whose removal is decided, with the contents behind promises; it only takes time.
+    /// The prefix of an item whose removal, with the contents behind its promises, is decided and only takes
+    /// time.
     static constexpr const char* gonePrefix = ".trwgone-";
-    /// The same for the original of an item that was copied elsewhere, whose promises keep their contents.
+    /// The prefix of the original of an item that was copied elsewhere. The contents behind its promises are
+    /// kept.
     static constexpr const char* movedPrefix = ".trwmoved-";
-    /// A copy that is not whole yet.
+    /// The prefix of a copy that is not whole yet.
     static constexpr const char* temporaryPrefix = ".trwtmp-";
 
-    /// Writes a record. A full disk is no error, since something must be removable there: the record is then
-    /// empty.
+    /// Writes a record. A full disk is no error, because items must be removable then; the record is empty in
+    /// that case.
     static system::SystemResult<WorkRecord> write(const DriveLayout& layout, const Places& places);
-    /// Hands out every record whose process is gone. Those that `settle` answers true for go; the others stay
-    /// for another time.
+    /// Calls `settle` for every record whose process has ended. When it answers true the record is removed;
+    /// otherwise the record stays for another time.
     static void forEachAbandoned(const DriveLayout& layout, const std::function<bool(const Places&)>& settle);
-    /// Whether a name of the private folder is a record's, or has one.
+    /// Answers whether a name in the private folder is a record's name or has a record.
     static bool isRecorded(const DriveLayout& layout, const std::string& name);
 
     WorkRecord(WorkRecord&& other) noexcept;
