@@ -12,18 +12,18 @@ namespace host::drive {
 
 /// Names a document for another device of the same account.
 struct Bookmark {
-    /// Longest bookmark text that is looked at, in bytes.
+    /// Longer texts are refused; bytes.
     static constexpr std::size_t maximumLength = 4096;
 
     std::string account; ///< the account's identity
     std::string container;
-    std::string path; ///< below the container's documents folder; made of plain names
+    std::string path; ///< below the container's documents folder, made of plain names
     std::uint32_t documentIdentifier = 0; ///< 0: none
 
     bool operator==(const Bookmark&) const = default;
 
     std::string encoded() const;
-    /// Nothing for a text that is too long or no bookmark.
+    /// Answers nothing for a text that is too long or not a bookmark.
     static std::optional<Bookmark> decode(std::string_view text);
 };
 

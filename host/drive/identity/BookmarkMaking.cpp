@@ -26,7 +26,7 @@ platform::Error notBookmarkable(const Url& url)
         textKey("The document can’t be opened on your other devices."));
 }
 
-/// Whether a path is below a folder; it is then shortened to what follows the folder.
+/// Answers whether a path is below a folder, and shortens it to the part below.
 bool takeFolder(std::string_view& path, std::string_view folder)
 {
     if (!path.starts_with(folder) || path.size() <= folder.size() + 1 || path[folder.size()] != '/')
@@ -35,7 +35,8 @@ bool takeFolder(std::string_view& path, std::string_view folder)
     return true;
 }
 
-/// The container and the path below its documents folder; no path for what is no document of a container.
+/// Answers the container and the path below its documents folder. The path is empty when the item is not a
+/// document of a container.
 Bookmark placeOf(const DriveLayout& layout, const std::string& path)
 {
     std::string_view rest = path;
@@ -62,7 +63,8 @@ Result<std::string> makeBookmark(const DriveLayout& layout, const Url& url, cons
         return notBookmarkable(url);
     bookmark.account = account->identity;
     bookmark.documentIdentifier = identify(real->substr(layout.home().size() + 1));
-    // Names are bytes, but the text of a bookmark is not: the place of such a document cannot be told.
+    // A name may be any bytes but a bookmark's text must be UTF-8, so such a document can be named by its
+    // identifier alone.
     if (bookmark.documentIdentifier == 0 && !platform::isValidUtf8(bookmark.path))
         return notBookmarkable(url);
     auto text = bookmark.encoded();

@@ -14,14 +14,14 @@
 
 namespace host::drive {
 
-/// Answers the document identifier of the item at a path below the drive's home, giving it one when it has
-/// none; 0 when it can have none.
+/// Answers the document identifier of the item at a path below the drive's home, and gives the item one when
+/// it has none. Answers 0 when it cannot have one.
 using IdentifyDocument = std::function<std::uint32_t(const std::string& relativePath)>;
 
-/// The bookmark string of an item of the drive, present or promised. CloudErrorCode::NotBookmarkable for what
-/// another device could not open: what lies outside the documents folders of the containers or is gone, a
-/// name that is no text where there is no identifier, and where nobody is signed in. Any thread; reads the
-/// disk.
+/// Answers the bookmark string of an item of the drive, present or promised. The error is
+/// CloudErrorCode::NotBookmarkable when another device could not open the item: for an item outside the
+/// containers' documents folders or one that does not exist, for a name that is not UTF-8 when there is no
+/// identifier, and when nobody is signed in. Any thread; reads the disk.
 platform::Result<std::string> makeBookmark(
     const DriveLayout& layout, const platform::Url& url, const IdentifyDocument& identify);
 

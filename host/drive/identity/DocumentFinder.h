@@ -8,13 +8,13 @@
 
 namespace host::drive {
 
-/// Looks through the drive for what carries document identifiers. Nothing is opened for long and no link
-/// followed; where two items carry one identifier (a copy with its attributes), the older one counts.
+/// Searches the drive for items that carry document identifiers. It keeps no file open for long and follows
+/// no link. When two items carry one identifier (a copy with its attributes), the older one counts.
 class DocumentFinder {
 public:
-    /// How many names one search looks at.
+    /// How many names one search reads.
     enum class Effort : std::size_t {
-        Unnoticed = 10'000, ///< some ten milliseconds: for the main thread
+        Unnoticed = 10'000, ///< takes some ten milliseconds, for the main thread
         Whole = 100'000'000,
     };
 
@@ -23,8 +23,8 @@ public:
     {
     }
 
-    /// Where the item lies that carries an identifier. The one at the known inode counts before others; then
-    /// the search ends at once. `isExhaustive`: whether everything was looked at, as far as it can be read.
+    /// Finds the item that carries an identifier. The item at the known inode counts before others, and the
+    /// search then ends at once. `isExhaustive` says whether everything was read, as far as it can be read.
     struct Finding {
         std::optional<DocumentPlace> place;
         bool isExhaustive = true;
@@ -32,7 +32,7 @@ public:
     Finding findInFolderOf(const IdentifiedPlace& known, Effort effort) const;
     Finding findInDrive(const IdentifiedPlace& known, Effort effort) const;
 
-    /// Everything with an identifier.
+    /// Answers every item with an identifier.
     std::vector<IdentifiedPlace> findAll() const;
 
 private:

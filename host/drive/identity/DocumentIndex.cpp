@@ -14,10 +14,10 @@ using Use = IndexDatabase::Use;
 
 namespace {
 
-/// Documents that are noted in one transaction; others may read and write in between.
+/// So many documents are noted in one transaction; other processes may read and write in between.
 constexpr std::size_t batch = 500;
 
-/// Where the paths below a folder begin and end, in the order of their bytes.
+/// The first and the last path below a folder, in the order of their bytes.
 struct PathsBelow {
     explicit PathsBelow(const std::string& folder)
         : first(folder + '/')
@@ -111,7 +111,8 @@ std::optional<std::uint32_t> DocumentIndex::reserve(const DocumentPlace& place)
     const std::lock_guard lock(_mutex);
     if (!isReadyFor(Use::Writing))
         return std::nullopt;
-    // By chance rather than in turn: should the index be lost, what it had given is still hardly given again.
+    // Identifiers are drawn at random and not in turn, so that a lost index rarely gives one of its
+    // identifiers again.
     std::random_device random;
     std::uniform_int_distribution<std::uint32_t> anyIdentifier(1);
     for (int tries = 0; tries < 32; ++tries) {
@@ -141,7 +142,7 @@ void DocumentIndex::release(std::uint32_t identifier)
 void DocumentIndex::noteMove(const std::string& from, const std::string& to)
 {
     const std::lock_guard lock(_mutex);
-    // Where there is no index, nothing can have moved in it.
+    // A missing index needs no change.
     if (_database.prepareFor(Use::Reading) == State::Missing || !isReadyFor(Use::Writing))
         return;
     const PathsBelow below(from);

@@ -13,9 +13,9 @@
 
 namespace host::drive {
 
-/// Where a document was last seen.
+/// The place where a document was last seen.
 struct DocumentPlace {
-    std::string path; ///< the item's, below the drive's home
+    std::string path; ///< the item's path below the drive's home
     std::uint64_t device = 0, inode = 0; ///< of the item or of its promise; 0: not known
     bool operator==(const DocumentPlace&) const = default;
 };
@@ -26,14 +26,14 @@ struct IdentifiedPlace {
     bool operator==(const IdentifiedPlace&) const = default;
 };
 
-/// Where documents with an identifier were last seen. It is a hint only: who asks must look whether the
-/// document still carries the identifier. What cannot be written is left out; a damaged index is begun anew
-/// by the next change. Any thread; several processes use it at once.
+/// The places where documents with an identifier were last seen. A place is only a hint, so the caller must
+/// check whether the document still carries the identifier. A change that cannot be written is dropped. A
+/// damaged index is begun anew by the next change. Any thread; several processes use the index at once.
 class DocumentIndex {
 public:
     using State = IndexDatabase::State;
 
-    /// Nothing is opened before it is needed.
+    /// The file is opened at the first use.
     explicit DocumentIndex(std::string path)
         : _database(std::move(path))
     {
@@ -43,31 +43,33 @@ public:
         enum class Kind : std::uint8_t {
             Known,
             Unknown, ///< it is not in the index
-            Removed, ///< the document was removed; its identifier is never given again
-            Unreadable, ///< the index cannot be asked
+            Removed, ///< the document was removed, and its identifier is never given again
+            Unreadable, ///< the index cannot be read
         };
         Kind kind = Kind::Unreadable;
-        DocumentPlace place; ///< of a known one
+        DocumentPlace place; ///< set for a known document
     };
-    /// Waits for nobody unless it is for writing.
+    /// Looks up an identifier. It does not wait for other processes unless it is for writing.
     Answer lookUp(std::uint32_t identifier, IndexDatabase::Use use = IndexDatabase::Use::Reading) const;
-    /// All documents at a path and below it.
+    /// Answers all documents at a path and below it.
     std::vector<IdentifiedPlace> documentsWithin(const std::string& path) const;
     State state() const;
-    /// The same, but with patience, and of an index that was made where there was none to use.
+    /// Answers the state like state(), but waits for other processes and creates the index when there is no
+    /// usable one.
     State prepareForWriting();
 
-    /// Notes where a document is, making the index when there is none; whether it was noted. One that was
-    /// removed stays so.
+    /// Notes the place of a document, and creates the index when there is none. Answers whether it was noted.
+    /// A removed document stays removed.
     bool note(std::uint32_t identifier, const DocumentPlace& place);
-    /// An identifier that the index does not know, noted for a place; nothing when it cannot be written.
+    /// Reserves an identifier that the index does not know, for a place. Answers nothing when the index
+    /// cannot be written.
     std::optional<std::uint32_t> reserve(const DocumentPlace& place);
     /// Gives a reserved identifier back.
     void release(std::uint32_t identifier);
-    /// An item and everything below it lies elsewhere now.
+    /// Notes that an item and everything below it were moved.
     void noteMove(const std::string& from, const std::string& to);
     void noteRemoval(std::uint32_t identifier);
-    /// Notes everything that the drive holds; from then on the index is complete. Whether it could be
+    /// Notes all documents of the drive, after which the index is complete. Answers whether it could be
     /// written.
     bool complete(const std::vector<IdentifiedPlace>& all);
 

@@ -12,9 +12,9 @@ namespace host::drive {
 
 namespace {
 
-constexpr int patience = 500; // milliseconds that a writer waits for another process that writes
+constexpr int patience = 500; // milliseconds for which a writer waits for a writing process
 
-// Versions of what the file holds. Any other number is a file that this program did not write.
+// The versions of the file's format. This program did not write a file with any other number.
 constexpr int incompleteVersion = 11;
 constexpr int completeVersion = 12;
 
@@ -53,7 +53,7 @@ IndexDatabase::Query& IndexDatabase::Query::bind(int at, std::int64_t number)
 
 IndexDatabase::Query& IndexDatabase::Query::bind(int at, const std::string& bytes)
 {
-    // Names are bytes, not necessarily text.
+    // Names are bytes and not necessarily text.
     sqlite3_bind_blob(_statement, at, bytes.data(), static_cast<int>(bytes.size()), SQLITE_STATIC);
     return *this;
 }
@@ -87,7 +87,7 @@ IndexDatabase::State IndexDatabase::prepareFor(Use use)
         sqlite3_file_control(_database.get(), "main", SQLITE_FCNTL_HAS_MOVED, &isMoved);
         sqlite3_busy_timeout(_database.get(), use == Use::Writing ? patience : 0);
     }
-    // What was found damaged stays so, however well it begins, until it is replaced.
+    // A damaged database counts as damaged until it is replaced, even if a part of it can be read.
     const bool isDamaged = _database && isMoved == 0 && _state == State::Damaged;
     const bool isUsable = _state == State::Complete || _state == State::Incomplete;
     if (!isDamaged && (!_database || isMoved != 0 || !isUsable))
@@ -114,7 +114,7 @@ IndexDatabase::State IndexDatabase::open(Use use)
     }
     sqlite3_extended_result_codes(opened, 1);
     sqlite3_busy_timeout(opened, use == Use::Writing ? patience : 0);
-    // What is damaged must not be believed where it can be told.
+    // These settings make the library notice damage where it can.
     run("PRAGMA cell_size_check = ON; PRAGMA synchronous = NORMAL; PRAGMA trusted_schema = OFF");
     std::int64_t version = 0, count = 0;
     int code = SQLITE_OK;
@@ -142,7 +142,7 @@ IndexDatabase::State IndexDatabase::makeTables()
     run("PRAGMA journal_mode = WAL");
     if (run(tables))
         return State::Incomplete;
-    // Another process may have been quicker.
+    // Another process may have created it meanwhile.
     const int code = sqlite3_extended_errcode(_database.get());
     run("ROLLBACK");
     auto query = this->query("PRAGMA user_version");
@@ -182,7 +182,7 @@ IndexDatabase::State IndexDatabase::judge(int code)
     static constexpr platform::Operation op{"-[IndexDatabase judge:]"};
     if (code == SQLITE_ROW || code == SQLITE_DONE || code == SQLITE_OK)
         return _state;
-    // A statement that cannot be prepared leaves its reason with the connection.
+    // The connection knows why a statement could not be prepared.
     if (code == SQLITE_ERROR && _database)
         code = sqlite3_extended_errcode(_database.get());
     const int primary = code & 0xff;
@@ -202,7 +202,7 @@ void IndexDatabase::close()
 void IndexDatabase::discard()
 {
     close();
-    // The log of the old file would be replayed into the new one.
+    // The old file's write-ahead log must go as well, because it would be replayed into the new file.
     for (const char* suffix : {"-wal", "-shm", ""})
         ::unlink((_path + suffix).c_str());
 }

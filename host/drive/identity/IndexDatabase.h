@@ -13,19 +13,19 @@ struct sqlite3_stmt;
 
 namespace host::drive {
 
-/// A connection to the database file of the document index; one thread at a time. The file may be removed or
-/// replaced by others meanwhile: the next use then opens the one that is there.
+/// A connection to the database file of the document index, for one thread at a time. Other processes may
+/// remove or replace the file meanwhile; the next use then opens the file that exists.
 ///
-/// The database keeps a write-ahead log: a reader never waits for a writer, which matters on the main thread,
-/// a writer that is killed leaves nothing half done, and a commit needs no sync (a power cut costs the last
-/// changes, which the next look at those documents makes up for). A damaged database is discarded, and the
-/// index is made anew from a walk through the drive; while another process keeps it locked, that walk
-/// answers.
+/// The database keeps a write-ahead log. A reader then never waits for a writer, which matters on the main
+/// thread; a writer that is killed leaves nothing half done; and a commit needs no sync (a power cut costs
+/// the last changes, which are found again when those documents are next read). A damaged database is
+/// discarded, and the index is made anew from a walk through the drive; while another process keeps it
+/// locked, that walk answers.
 class IndexDatabase {
 public:
     enum class Use : std::uint8_t { Reading, Writing };
     enum class State : std::uint8_t {
-        Missing, ///< there is none, or an empty file
+        Missing, ///< there is no file, or an empty one
         Incomplete, ///< documents with an identifier may be missing from it
         Complete,
         Damaged, ///< must be discarded
@@ -37,12 +37,13 @@ public:
     {
     }
 
-    /// Opens the database where that is needed; for writing a missing one is made and a damaged one replaced
-    /// by an empty one. Answers Incomplete or Complete when it can be used. Reading waits for nobody.
+    /// Opens the database if needed. For writing, a missing one is created and a damaged one is replaced by
+    /// an empty one. Answers Incomplete or Complete when the database can be used. Reading never waits for
+    /// another process.
     State prepareFor(Use use);
     State setComplete();
 
-    /// A statement that is used once: reset at the end, kept prepared for the next time.
+    /// A statement for one use. The destructor resets it, and it stays prepared for the next use.
     class Query {
     public:
         explicit Query(sqlite3_stmt* statement)
@@ -56,7 +57,7 @@ public:
         Query& bind(int at, std::int64_t number);
         /// The bytes must live as long as the query.
         Query& bind(int at, const std::string& bytes);
-        /// One step; sqlite's code.
+        /// Runs one step and answers sqlite's code.
         int step();
         std::int64_t number(int column) const;
         std::string bytes(int column) const;
@@ -65,13 +66,13 @@ public:
     private:
         sqlite3_stmt* _statement;
     };
-    /// `text` must be a literal.
+    /// `text` must be a literal, because its address is the key of the prepared statement.
     Query query(const char* text);
     int changes() const;
-    /// Runs statements without parameters; whether they succeeded.
+    /// Runs statements without parameters and answers whether they succeeded.
     bool run(const char* text);
 
-    /// What a code that ended a query says of the database; a damaged one is noted in the log.
+    /// Answers the database's state after a query ended with a code. Damage is logged.
     State judge(int code);
 
 private:
@@ -88,7 +89,8 @@ private:
 
     std::string _path;
     std::unique_ptr<sqlite3, Close> _database;
-    std::map<const char*, std::unique_ptr<sqlite3_stmt, Finalize>> _statements; // end before the database
+    std::map<const char*, std::unique_ptr<sqlite3_stmt, Finalize>>
+        _statements; // destroyed before the database
     State _state = State::Missing;
 };
 

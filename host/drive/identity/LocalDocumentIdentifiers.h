@@ -14,15 +14,16 @@ namespace host::drive {
 
 class IdentifiedItem;
 
-/// Document identifiers in an extended attribute of the items and in their promises, found through an index.
+/// Keeps document identifiers in an extended attribute of the items and in their promises, and finds
+/// documents by them through an index.
 ///
-/// The index only says where to look first: an answer is always read from the file that is then open. What
-/// this program moves and removes is noted at once; what others do is noted when the item is next read, and
-/// else when it is looked up and is not where it was.
+/// The index only says where to look first: an answer is always read from the file that is then open. Moves
+/// and removals by this program are noted at once. Moves by others are noted when the item is next read, or
+/// else when it is looked up and is not in its place.
 ///
-/// Numbers are drawn by chance, so that an index that was lost does not lead to one being given twice; one
-/// whose document was removed is kept as removed. Of two items with one number the one at the known inode has
-/// it, else the older one; the other gets a new number when it needs one.
+/// Identifiers are drawn at random, so that a lost index does not lead to one being given twice. The
+/// identifier of a removed document is kept as removed. Of two items with one identifier the one at the known
+/// inode keeps it, else the older one; the other gets a new identifier when it needs one.
 class LocalDocumentIdentifiers : public platform::DocumentIdentifiers,
                                  public std::enable_shared_from_this<LocalDocumentIdentifiers> {
 public:
@@ -36,20 +37,21 @@ public:
     platform::Result<std::shared_ptr<const OpenFile>> open(const File& file) override;
     platform::Result<std::uint32_t> identify(const platform::Url& url) override;
 
-    /// As identify(), of what is at a path below the drive's home.
+    /// Works like identify() for the item at a path below the drive's home.
     platform::Result<std::uint32_t> identifyAt(const std::string& path);
-    /// Where the document is now, all steps at once; the search takes all the time it needs.
+    /// Answers the current place of the document, all steps at once. The search takes all the time that it
+    /// needs.
     std::optional<platform::Url> find(std::uint32_t identifier);
 
-    /// An item at an absolute path was read and carries an identifier. Costs a look into a small table where
-    /// nothing is new; the index is corrected in the background. Any thread.
+    /// Tells that an item at an absolute path was read and carries an identifier. When nothing is new it
+    /// costs a look into a small table; otherwise the index is corrected in the background. Any thread.
     void seen(std::uint32_t identifier, const std::string& path);
-    /// An item is elsewhere now; the paths are absolute.
+    /// Tells that an item was moved. The paths are absolute.
     void moved(const std::string& from, const std::string& to);
-    /// An item is where it was, but is another file now (its content came from the cloud). Noted in the
-    /// background.
+    /// Tells that the item at a path is another file now, because its content was downloaded. It is noted in
+    /// the background.
     void replaced(const std::string& path);
-    /// The documents at a path and below it that are really there, to be told of when they are removed.
+    /// Answers the documents at a path and below it that really exist, for removed() when they are removed.
     std::vector<std::uint32_t> documentsWithin(const std::string& path) const;
     void removed(const std::vector<std::uint32_t>& identifiers);
 
@@ -72,10 +74,10 @@ private:
     DocumentFinder _finder;
     std::shared_ptr<platform::Dispatch> _dispatch;
     std::shared_ptr<platform::Queue> _queue;
-    std::mutex _mutex; ///< for what follows
+    std::mutex _mutex; ///< guards the fields below
     std::optional<std::uint64_t> _device;
-    std::map<std::uint32_t, std::string> _seen; ///< where items were read last
-    std::set<std::uint32_t> _searched; ///< looked for in the whole drive since the start
+    std::map<std::uint32_t, std::string> _seen; ///< the paths where items were last read
+    std::set<std::uint32_t> _searched; ///< searched for in the whole drive since the start
 };
 
 } // namespace host::drive
