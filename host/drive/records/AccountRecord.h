@@ -12,27 +12,28 @@
 
 namespace host::drive {
 
-/// What account.json says of the signed-in account.
+/// The content of account.json, which describes the signed-in account.
 struct AccountRecord {
-    /// Largest account file that is read, in bytes.
+    /// Larger account files are not read; bytes.
     static constexpr std::size_t maximumFileSize = 64 * 1024;
 
-    std::string identity; ///< tells accounts apart, never empty
+    std::string identity; ///< identifies the account, never empty
     std::string displayName;
     std::optional<platform::StorageOffer> storageOffer;
 
     bool operator==(const AccountRecord&) const = default;
 
-    /// Reads the account's file. Neither a value nor an error: nobody is signed in. An error: the file is
-    /// there but cannot be used; it is left as it is. Any thread.
+    /// Reads the account's file. Neither a value nor an error means that nobody is signed in. An error means
+    /// that the file exists but cannot be used; it is left as it is. Any thread.
     static platform::Result<AccountRecord> read(const DriveLayout& layout);
-    /// The same from the file's text.
+    /// Parses the file's text.
     static platform::Result<AccountRecord> parse(const std::string& text, const std::string& path);
 
     std::string toJson() const;
 };
 
-/// The identity that a person's name gives on the local store: the same name always gives the same one.
+/// Answers the identity that a person's name gives on the local store. The same name always gives the same
+/// identity.
 std::string localIdentity(const std::string& displayName);
 
 } // namespace host::drive

@@ -16,7 +16,7 @@ namespace {
 
 constexpr std::size_t longestIdentifier = 64;
 constexpr std::int64_t second = 1'000'000'000;
-/// The year 2262, where nanoseconds in 64 bits end.
+/// The year 2262, at which nanoseconds in 64 bits end.
 constexpr std::int64_t lastSecond = INT64_MAX / second;
 
 bool isIdentifierCharacter(char c)

@@ -13,16 +13,16 @@
 
 namespace host::drive {
 
-/// What one device tells the others of its current activity, as it lies in the account's folder.
+/// The file in the account's folder by which one device tells the others of its current activity.
 struct ActivityRecord {
-    /// Largest file that is read, in bytes.
+    /// Larger files are not read; bytes.
     static constexpr std::size_t maximumFileSize = 16 * 1024;
 
     std::string device; ///< identifier: letters, digits and hyphens
     std::string deviceName;
-    std::string account; ///< identity
-    platform::UserActivity activity; ///< only texts of its information are kept
-    platform::Date time; ///< when it was written, in whole seconds
+    std::string account; ///< the account's identity
+    platform::UserActivity activity; ///< only texts of its user information are stored
+    platform::Date time; ///< the time of the writing, in whole seconds
 
     bool operator==(const ActivityRecord&) const = default;
 
@@ -30,7 +30,7 @@ struct ActivityRecord {
     static bool isDevice(std::string_view identifier);
 
     std::string toJson() const;
-    /// Nothing for a text that is no record. Unknown members are passed over.
+    /// Answers nothing for a text that is not a record. Unknown members are ignored.
     static std::optional<ActivityRecord> parse(std::string_view text);
 };
 

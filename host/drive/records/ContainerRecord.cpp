@@ -90,7 +90,7 @@ std::string ContainerRecord::toJson() const
 std::string ContainerRecord::nameIn(const std::vector<std::string>& languages) const
 {
     for (const auto& language : languages) {
-        // "de_AT" is served by "de", but not the other way round.
+        // "de" serves "de_AT", but not the other way round.
         for (const auto& known : {language, language.substr(0, language.find('_'))}) {
             if (const auto found = names.find(known); found != names.end())
                 return found->second;

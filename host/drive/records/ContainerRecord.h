@@ -12,9 +12,9 @@
 
 namespace host::drive {
 
-/// A container's description as it is on disk.
+/// A container's description as it is stored on disk.
 struct ContainerRecord {
-    /// Largest description that is read, in bytes.
+    /// Larger descriptions are not read; bytes.
     static constexpr std::size_t maximumFileSize = 256 * 1024;
 
     std::map<std::string, std::string> names; ///< by language ("de", "pt_BR")
@@ -23,12 +23,12 @@ struct ContainerRecord {
     std::vector<std::string> owningApps;
     std::optional<std::string> iconName;
 
-    /// Nothing for a text that is no JSON object. A field of the wrong kind is as if it were not there.
+    /// Answers nothing for a text that is not a JSON object. A member of the wrong type counts as missing.
     static std::optional<ContainerRecord> parse(const std::string& text);
     std::string toJson() const;
 
-    /// The name in the first of the languages that there is one for, else the English one, else any, else
-    /// empty.
+    /// Answers the name in the first of the languages that has one, else the English name, else any, else an
+    /// empty text.
     std::string nameIn(const std::vector<std::string>& languages) const;
 };
 

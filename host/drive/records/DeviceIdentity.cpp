@@ -18,7 +18,7 @@ namespace host::drive {
 namespace {
 
 constexpr std::size_t longestFile = 256, longestInformation = 64 * 1024; // bytes
-/// What the system keeps about the machine, in the form of a shell's assignments.
+/// The system's description of the machine, in the form of shell assignments.
 constexpr const char* machineInformation = "/etc/machine-info";
 
 using Text = std::unique_ptr<char, decltype(&g_free)>;
@@ -34,7 +34,7 @@ std::string makeIdentifier(const std::string& path)
     return identifier;
 }
 
-/// What the machine's user called it, else its name in the network.
+/// Answers the name that the user gave the machine, else its network name.
 std::string machineName()
 {
     constexpr std::string_view key = "\nPRETTY_HOSTNAME=";

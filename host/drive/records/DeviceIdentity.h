@@ -7,16 +7,16 @@
 
 namespace host::drive {
 
-/// Tells this device from the account's other devices. The identifier lies in the state folder, so that two
+/// Identifies this device among the account's devices. The identifier is stored in the state folder, so two
 /// state folders on one drive are two devices.
 struct DeviceIdentity {
-    std::string identifier; ///< letters, digits and hyphens; stays the same
-    std::string name; ///< as its user knows it
+    std::string identifier; ///< letters, digits and hyphens; it stays the same
+    std::string name; ///< the name that the user knows
 
-    /// Reads the identifier from a file; makes one, and the file, when there is none or it is damaged. Where
-    /// the file cannot be written the identifier holds for this process. Any thread.
+    /// Reads the identifier from a file. When the file is missing or damaged, it makes an identifier and the
+    /// file. When the file cannot be written, the identifier is valid for this process only. Any thread.
     static DeviceIdentity atFile(const std::string& path);
-    /// The identifier in the file; empty when there is none. Any thread.
+    /// Answers the identifier in the file; empty when there is none. Any thread.
     static std::string identifierAt(const std::string& path);
 };
 

@@ -15,12 +15,12 @@ class TypeRegistry;
 
 namespace host::drive {
 
-/// The services that the drive's own services stand on.
+/// The services that the drive's own services need.
 struct DriveDependencies {
     std::shared_ptr<platform::Dispatch> dispatch;
     std::shared_ptr<platform::NotificationCenter> notificationCenter;
     std::shared_ptr<platform::TypeRegistry> typeRegistry;
-    std::shared_ptr<platform::Localization> localization; ///< null: no name is translated
+    std::shared_ptr<platform::Localization> localization; ///< null: names are not translated
     std::shared_ptr<platform::LinkOpener> linkOpener; ///< null: no page can be opened
 };
 

@@ -33,7 +33,7 @@ std::string stateFromEnvironment()
     return folder.empty() ? folder : std::filesystem::absolute(folder).lexically_normal().string();
 }
 
-// The one account that the local store itself provides.
+// The local store itself provides only this account.
 constexpr std::string_view localAccountFolder = "/local";
 
 } // namespace

@@ -10,8 +10,8 @@
 
 namespace host::drive {
 
-/// Where everything of an account lies on disk. All paths are absolute; nothing is looked at or made but by
-/// prepare().
+/// The paths of everything that belongs to an account. All paths are absolute. Only prepare() reads or
+/// changes the disk.
 class DriveLayout {
 public:
     /// The identifier of the default container, whose folder is the top level of the drive.
@@ -19,10 +19,11 @@ public:
     /// The folder inside any other container that holds its documents.
     static constexpr std::string_view documentsFolderName = "Documents";
 
-    /// `$TARROW_DRIVE_HOME`, else the local account's folder below `$XDG_DATA_HOME/tarrow-drive/`. A home of
-    /// the environment's choice keeps the state inside, unless `$TARROW_DRIVE_STATE` says where.
+    /// Answers `$TARROW_DRIVE_HOME`, else the local account's folder below `$XDG_DATA_HOME/tarrow-drive/`. A
+    /// home from the environment contains the state as well, unless `$TARROW_DRIVE_STATE` names another
+    /// folder.
     static DriveLayout fromEnvironment();
-    /// A layout at a folder; `state` empty means a folder inside it.
+    /// Answers a layout at a folder. An empty `state` means a folder inside it.
     static DriveLayout at(std::string home, std::string state = {});
 
     const std::string& home() const { return _home; }
@@ -32,24 +33,24 @@ public:
     std::string account() const { return _home + '/' + std::string(accountFileName); }
     std::string keyValueStore() const { return _home + '/' + std::string(keyValueFileName); }
     std::string index() const { return _home + "/index.sqlite"; } ///< document identifiers
-    std::string cloud() const { return _home + "/cloud"; } ///< contents of what is not downloaded
-    /// What the account's devices are doing, a file for each.
+    std::string cloud() const { return _home + "/cloud"; } ///< contents of items that are not downloaded
+    /// The folder with one file for each device, which tells its current activity.
     std::string activities() const { return _home + "/activities"; }
-    /// Items that are being removed, each under a private name.
+    /// The folder of items that are being removed, each under a private name.
     std::string held() const { return _home + "/held"; }
-    /// Where the processes that use the drive exclude each other; its content is never read.
+    /// The lock file by which the processes that use the drive exclude each other. Its content is never read.
     std::string coordination() const { return locks() + "/coordination"; }
-    /// Whoever gives a document identifier holds this file locked; its content is never read.
+    /// The lock file that is held while an identifier is given to a document. Its content is never read.
     std::string identification() const { return locks() + "/identifiers"; }
     std::string locks() const { return _home + "/locks"; }
-    /// What the application keeps between runs: defaults and saved interface state.
+    /// The folder of the application's own state: defaults and saved interface state.
     const std::string& state() const { return _state; }
     std::string defaults() const { return _state + "/defaults.json"; }
-    std::string device() const { return _state + "/device"; } ///< what tells this device from others
+    std::string device() const { return _state + "/device"; } ///< this device's identifier
     std::string interfaceState() const { return _state + "/interface.json"; }
 
     std::string container(std::string_view identifier) const;
-    /// The documents folder of a container.
+    /// Answers the documents folder of a container.
     std::string containerDocuments(std::string_view identifier) const;
     std::string containerDescription(std::string_view identifier) const;
     std::string defaultContainer() const { return container(defaultContainerIdentifier); }
@@ -57,9 +58,8 @@ public:
     platform::Url documentsURL() const;
     platform::Url defaultContainerURL() const;
 
-    /// Makes the home folder (only the user may enter it) when it is missing, and answers the same layout
-    /// with the links in the home's path resolved, so that paths compare equal to what the file system
-    /// answers.
+    /// Creates the home folder when it is missing, for the user alone, and answers the same layout with the
+    /// links in the home's path resolved, so that paths compare equal to the file system's answers.
     DriveLayout prepare() const;
 
     static constexpr std::string_view accountFileName = "account.json";

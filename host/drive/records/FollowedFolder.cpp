@@ -40,7 +40,7 @@ FollowedFolder::FollowedFolder(
 void FollowedFolder::watch()
 {
     if (_ifMissing == IfMissing::Make)
-        ::mkdir(_path.c_str(), 0700); // the watch tells when this failed
+        ::mkdir(_path.c_str(), 0700); // the watch reports a failure
     _watcher =
         std::make_unique<host::system::FolderWatcher>(platform::weakly(this, &FollowedFolder::namesChanged));
     _isWatched = _watcher->watch(_path);

@@ -13,18 +13,19 @@
 
 namespace host::drive {
 
-/// A folder of the drive that is watched for as long as this lives, also after it went away and came back, as
-/// when its volume was taken off for a while. Main thread.
+/// Watches a folder of the drive for as long as this lives. It also finds the folder again when that
+/// disappears and comes back, for instance with its volume. Main thread.
 class FollowedFolder : public std::enable_shared_from_this<FollowedFolder> {
 public:
-    /// Called on the main thread with the names that changed; an empty one: anything may have.
+    /// Called on the main thread with the names that changed. An empty list means that anything may have
+    /// changed.
     using Handler = std::function<void(const std::vector<std::string>& names)>;
     enum class IfMissing { Wait, Make };
 
     static std::shared_ptr<FollowedFolder> follow(
         std::shared_ptr<platform::Dispatch> dispatch, std::string path, IfMissing ifMissing, Handler changed);
 
-    /// Whether it was there to be watched when it was last looked for.
+    /// Answers whether the folder existed at the last look, so that it is watched.
     bool isWatched() const { return _isWatched; }
 
 private:
@@ -43,7 +44,7 @@ private:
     bool _isWatched = false;
 };
 
-/// Whether a name is among those that changed, or may be.
+/// Answers whether a name changed or may have changed.
 bool mayHaveChanged(const std::vector<std::string>& names, std::string_view name);
 
 } // namespace host::drive

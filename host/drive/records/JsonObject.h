@@ -11,14 +11,14 @@
 
 namespace host::drive {
 
-/// A text as a JSON object; nothing for anything else, and for what is nested too deep.
+/// Parses a text as a JSON object. Answers nothing for any other text, and for one that is nested too deep.
 std::optional<nlohmann::json> parseJsonObject(std::string_view text);
 
-/// A member of an object; null when there is none.
+/// Answers a member of an object, or null when there is none.
 const nlohmann::json& member(const nlohmann::json& object, const char* key);
-/// A value as text; nothing for any other kind.
+/// Answers a value as text, or nothing for any other type.
 std::optional<std::string> textOf(const nlohmann::json& value);
-/// A member as text; empty when there is none or it is of another kind.
+/// Answers a member as text; empty when there is none or it has another type.
 std::string textMember(const nlohmann::json& object, const char* key);
 
 } // namespace host::drive

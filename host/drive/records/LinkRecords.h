@@ -15,22 +15,22 @@ namespace host::drive {
 
 using system::referenceExtension;
 
-/// Largest reference or alias that is read, in bytes.
+/// Larger references and aliases are not read; bytes.
 inline constexpr std::size_t maximumLinkRecordSize = 64 * 1024;
 
-/// The text of a reference to a document, by its container and the path below the container's documents
-/// folder.
+/// Answers the text of a reference to a document, by its container and the path below the container's
+/// documents folder.
 std::string referenceJson(const std::string& container, const std::string& path);
-/// The text of an alias: a path below the documents area, or an absolute one.
+/// Answers the text of an alias, for a path below the documents area or an absolute one.
 std::string aliasJson(const std::string& path);
 
-/// Reads a reference or an alias. Errors: there is none, it is damaged, or it leads out of its container (the
-/// documents area for an alias with a relative path).
+/// Read a reference or an alias. It is an error when there is none, when it is damaged, or when it leads out
+/// of its container (for an alias with a relative path, out of the documents area).
 platform::Result<platform::Url> readReference(const std::string& path, const DriveLayout& layout);
 platform::Result<platform::Url> readAlias(const std::string& path, const DriveLayout& layout);
 
-/// Whether a path is made of plain names: not empty, none of them empty, "." or "..", no NUL, at most 4,096
-/// bytes.
+/// Answers whether a path is made of plain names: it is not empty, no name is empty, "." or "..", and it has
+/// no NUL and at most 4,096 bytes.
 bool isPlainRelativePath(std::string_view path);
 
 } // namespace host::drive

@@ -37,7 +37,7 @@ void removeLastName(std::string& path)
     path.resize(path.rfind('/'));
 }
 
-// The text of a link; nothing for anything else.
+// Answers the target of a link, or nothing for anything else.
 std::optional<std::string> linkTarget(const std::string& path, bool& exists)
 {
     std::array<char, PATH_MAX> target;

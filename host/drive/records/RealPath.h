@@ -8,12 +8,12 @@
 
 namespace host::drive {
 
-/// An absolute path with every symbolic link in it resolved, the last name's too, as far as the path exists;
-/// what does not exist is appended as it stands. Nothing when there are too many links (a loop), or when ".."
-/// would leave something that does not exist.
+/// Resolves every symbolic link in an absolute path, also in its last name, as far as the path exists. The
+/// part that does not exist is appended unchanged. Answers nothing when there are too many links (a loop), or
+/// when ".." follows a name that does not exist.
 std::optional<std::string> realPath(const std::string& path);
 
-/// The same, but a link as the last name stays a link.
+/// Resolves a path like realPath(), but keeps a link as the last name.
 std::optional<std::string> realPathOfEntry(const std::string& path);
 
 } // namespace host::drive

@@ -19,7 +19,7 @@ namespace {
 using platform::Error;
 namespace errorKey = platform::errorKey;
 
-// One read; only an interruption by a signal is tried again.
+// Reads once, and tries again only after an interruption by a signal.
 ssize_t readSome(const host::system::FileDescriptor& file, char* into, std::size_t size)
 {
     ssize_t count = 0;
@@ -72,8 +72,8 @@ platform::Result<std::string> readSmallFile(const std::string& path, std::size_t
 platform::Result<std::string> readSmallFile(
     const host::system::FileDescriptor& file, const std::string& path, std::size_t limit)
 {
-    // Most records fit here, and a read that does not fill its buffer has reached the end: one read is
-    // enough.
+    // Most records fit into this buffer, and a read that does not fill its buffer has reached the end, so one
+    // read is enough.
     std::array<char, 4096> buffer;
     std::string text;
     for (;;) {

@@ -13,23 +13,23 @@
 
 namespace host::drive {
 
-/// Reads a small file whole. A link as its last name is refused, and so is a file larger than `limit` bytes;
-/// it never waits for another program (a pipe reads as empty). Errors: FileErrorCode::NoSuchItem when there
-/// is none, else the system's, or CloudErrorCode::DamagedRecord for a file that is too large.
+/// Reads a small file whole. It refuses a link as the last name and a file larger than `limit` bytes, and
+/// never waits for another program (a pipe reads as empty). Errors: FileErrorCode::NoSuchItem when there is
+/// no file, CloudErrorCode::DamagedRecord for a file that is too large, else the system's.
 platform::Result<std::string> readSmallFile(const std::string& path, std::size_t limit);
-/// The same from a file that is open; `path` is named in errors.
+/// Reads a file that is already open; errors name `path`.
 platform::Result<std::string> readSmallFile(
     const host::system::FileDescriptor& file, const std::string& path, std::size_t limit);
 
-/// The error of a system call on an item of the drive: as host::system::systemError(), but an item below
-/// something that is no folder is missing, too.
+/// Answers the error of a system call on an item of the drive. It is host::system::systemError(), except that
+/// an item below something that is not a folder counts as missing.
 platform::Error itemError(int errorNumber, const std::string& path);
 inline platform::Error itemError(const host::system::SystemError& failure, const std::string& path)
 {
     return itemError(failure.number(), path);
 }
 
-/// Codes of errorDomain::cloud.
+/// The codes of errorDomain::cloud.
 enum class CloudErrorCode : int {
     DamagedRecord = 1,
     OutsideDrive,
@@ -39,12 +39,13 @@ enum class CloudErrorCode : int {
     MissingContent
 };
 
-/// A record of the drive that cannot be used: the cloud domain, with a sentence for the user and, as the
-/// failure reason, what the log says of it.
+/// Answers the error for a record of the drive that cannot be used: of the cloud domain, with a sentence for
+/// the user and, as the failure reason, the text for the log.
 platform::Error damagedRecord(const std::string& path, const std::string& reason);
-/// An error of the cloud domain with a sentence for the user; `sentence` is looked up in the catalogue.
+/// Answers an error of the cloud domain with a sentence for the user; `sentence` is looked up in the
+/// catalogue.
 platform::Error cloudError(CloudErrorCode code, const std::string& path, const char* sentence);
-/// What the log says of an error: its failure reason, else its description.
+/// Answers the text of an error for the log: its failure reason, else its description.
 std::string reasonOf(const platform::Error& error);
 
 } // namespace host::drive

@@ -15,7 +15,7 @@ namespace host::drive {
 
 namespace {
 
-// Network file systems report sizes beyond any disk; the figures must not overflow.
+// Network file systems report sizes beyond any disk, so the figures are limited to 64 bits.
 std::int64_t bytes(std::uint64_t blocks, std::uint64_t blockSize)
 {
     std::uint64_t result = 0;

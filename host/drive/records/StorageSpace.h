@@ -10,15 +10,15 @@
 
 namespace host::drive {
 
-/// The space of the file system that holds the drive, in bytes, as an ordinary user may fill it.
+/// The space in bytes of the file system that holds the drive, as far as an ordinary user may fill it.
 struct StorageSpace {
     std::int64_t free = 0;
     std::int64_t total = 0;
 
-    /// Less than a tenth is free.
+    /// Answers whether less than a tenth is free.
     bool isLow() const { return free < total / 10; }
 
-    /// Asks the file system; may wait for it.
+    /// Reads the space of the file system, and may wait for it.
     static platform::Result<StorageSpace> of(const std::string& path);
 };
 
