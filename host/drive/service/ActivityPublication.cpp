@@ -52,7 +52,7 @@ void ActivityPublication::set(const Activity& activity)
 {
     _current = activity;
     const auto update = platform::weakly(this, &ActivityPublication::bringUpToDate);
-    // The timer calls at once, too.
+    // The timer also calls at once.
     if (activity && activity->isEligibleForHandOff) {
         _renewal = _dispatch->startTimer(_queue, renewal, renewalLeeway, update);
     } else {
@@ -61,8 +61,8 @@ void ActivityPublication::set(const Activity& activity)
     }
 }
 
-/// What is current by now is written, whatever it was when this was asked for: a preview that is left at once
-/// leaves no trace.
+/// Writes the activity that is current now, whatever was current when this was posted, so that a preview that
+/// is left at once leaves no trace.
 void ActivityPublication::bringUpToDate()
 {
     Activity current;
@@ -86,7 +86,7 @@ void ActivityPublication::write(const platform::UserActivity& activity)
     const ActivityRecord record{
         device.identifier, device.name, account->identity, activity, _dispatch->now()};
     const auto path = _layout.activities() + '/' + ActivityRecord::fileName(device.identifier);
-    ::mkdir(_layout.activities().c_str(), 0700); // the write tells when this failed
+    ::mkdir(_layout.activities().c_str(), 0700); // the write reports a failure
     const std::lock_guard lock(_fileMutex);
     _written = path;
     if (const auto error = host::system::writeFileAtomically(path, record.toJson()))

@@ -19,17 +19,17 @@ class ActivityPublication : public std::enable_shared_from_this<ActivityPublicat
 public:
     using Activity = std::shared_ptr<const platform::UserActivity>;
 
-    /// How often a file is renewed. One that was not renewed for three times as long belongs to a device that
-    /// went off without a word.
+    /// The file is renewed so often. A file that was not renewed for three times as long belongs to a device
+    /// that ended without removing it.
     static constexpr platform::Duration renewal = std::chrono::minutes(5);
     static constexpr platform::Duration longestSilence = 3 * renewal;
 
     ActivityPublication(DriveLayout layout, std::shared_ptr<platform::Dispatch> dispatch);
-    /// Takes the file away at once.
+    /// Removes the file at once.
     ~ActivityPublication();
 
     void becomeCurrent(const Activity& activity);
-    /// Nothing when another one is current.
+    /// Does nothing when another activity is current.
     void resignCurrent(const Activity& activity);
 
 private:
@@ -41,10 +41,10 @@ private:
     DriveLayout _layout;
     std::shared_ptr<platform::Dispatch> _dispatch;
     std::shared_ptr<platform::Queue> _queue;
-    std::mutex _mutex; ///< of the two fields below
+    std::mutex _mutex; ///< guards the two fields below
     Activity _current;
     std::unique_ptr<platform::Timer> _renewal;
-    std::mutex _fileMutex; ///< of the file and the field below
+    std::mutex _fileMutex; ///< guards the file and the field below
     std::string _written; ///< the file that this process wrote; empty: none
 };
 

@@ -39,7 +39,7 @@ platform::Result<ItemVersion> IndexedItemChanges::replaceContent(
 std::optional<Error> IndexedItemChanges::evictItem(const std::string& path)
 {
     auto error = LocalItemChanges::evictItem(path);
-    // The item is where it was, but it is its promise that carries the identifier now.
+    // The item stays in its place, but now its promise carries the identifier.
     if (!error)
         _identifiers->moved(path, path);
     return error;

@@ -13,24 +13,24 @@
 
 namespace host::drive {
 
-/// Turns what was found of an item into the values of its attributes.
+/// Turns the facts of an item into the values of its attributes.
 class ItemAttributes {
 public:
-    /// Extension of alias files; their kind is called "Alias" in every language.
+    /// The extension of alias files. Their kind is called "Alias" in every language.
     static constexpr std::string_view aliasExtension = system::aliasExtension;
     static constexpr std::string_view aliasType = system::aliasType;
 
-    /// `localization` may be null: then no name is translated.
+    /// `localization` may be null; names are not translated then.
     ItemAttributes(std::shared_ptr<const platform::TypeRegistry> types,
         std::shared_ptr<const platform::DocumentContainers> containers,
         std::shared_ptr<const platform::Localization> localization, platform::Url defaultContainer);
 
-    /// Puts the values of the keys into a map, for an item that is here or promised. A key that the item has
-    /// no value for is left out; so is the thumbnail map.
+    /// Puts the values of the keys into a map, for an item that is downloaded or promised. A key without a
+    /// value for the item is left out, and so is the thumbnail map.
     void fill(platform::AttributeMap& map, const platform::Url& url, const ItemFacts& facts,
         platform::AttributeKeys keys) const;
 
-    /// Whether a picture is here, judged by its name.
+    /// Answers whether the item is a downloaded picture, judged by its name.
     bool isPicture(const platform::Url& url, const ItemFacts& facts) const;
 
 private:

@@ -8,7 +8,7 @@
 
 namespace host::drive {
 
-/// The account that account.json names, with the free space of the file system that holds the drive.
+/// The account in account.json, with the free space of the file system that holds the drive.
 class LocalAccount : public platform::CloudAccount {
 public:
     explicit LocalAccount(DriveLayout layout)

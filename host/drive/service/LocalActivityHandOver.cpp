@@ -22,7 +22,8 @@ using platform::ActivityOffer;
 using platform::Date;
 using platform::weakly;
 
-/// The clocks of two devices differ: a time ahead of ours is as good as one behind.
+/// Answers whether a record is recent. A time in the future counts like one in the past, because the clocks
+/// of two devices differ.
 bool isRecent(Date time, Date now)
 {
     const auto silence = now.nanoseconds - time.nanoseconds;
@@ -49,7 +50,7 @@ const std::string* bookmarkOf(const ActivityRecord& record)
     return value ? value->get<std::string>() : nullptr;
 }
 
-/// The document that this device shows itself; empty: none.
+/// Answers the bookmark of the document that this device shows; empty for none.
 std::string ownBookmark(const std::string& path)
 {
     const auto text = readSmallFile(path, ActivityRecord::maximumFileSize);
@@ -58,7 +59,7 @@ std::string ownBookmark(const std::string& path)
     return bookmark ? *bookmark : std::string();
 }
 
-/// What the other devices of the account say, as far as it is recent and not what is shown here already.
+/// Answers the recent records of the account's other devices, without the document that this device shows.
 std::vector<ActivityRecord> readRecords(const DriveLayout& layout, Date now)
 {
     const auto account = AccountRecord::read(layout);

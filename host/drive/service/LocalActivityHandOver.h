@@ -22,17 +22,17 @@ class CloudDocumentService;
 namespace host::drive {
 
 /// Hands activities over by small files in the account's folder, one for each device. ActivityPublication
-/// keeps this device's file; what another device's file says is offered while it is recent, of the same
-/// account, and its document is here. Make and destroy it on the main thread.
+/// keeps this device's file. The activity in another device's file is offered while it is recent, belongs to
+/// the same account, and its document exists here. Make and destroy it on the main thread.
 class LocalActivityHandOver : public platform::ActivityHandOver,
                               public std::enable_shared_from_this<LocalActivityHandOver> {
 public:
     using Activity = ActivityPublication::Activity;
 
-    /// More devices than this are not looked at.
+    /// At most so many devices' files are read.
     static constexpr std::size_t mostDevices = 64;
 
-    /// `cloud` finds the documents of what is offered.
+    /// `cloud` finds the documents of the offers.
     static std::shared_ptr<LocalActivityHandOver> create(const DriveLayout& layout,
         const DriveDependencies& dependencies, std::shared_ptr<platform::CloudDocumentService> cloud);
 
@@ -63,8 +63,8 @@ private:
     std::shared_ptr<FollowedFolder> _folder;
     platform::Observation _identity;
     std::vector<platform::ActivityOffer> _offers, _found;
-    std::size_t _undecided = 0; ///< records of the latest reading whose documents are looked for
-    unsigned _reading = 0; ///< the latest one; what comes from an older one is dropped
+    std::size_t _undecided = 0; ///< records of the latest reading whose documents are still being looked up
+    unsigned _reading = 0; ///< number of the latest reading; results of an older one are dropped
     bool _readingWaits = false, _readAgain = false;
 };
 

@@ -17,12 +17,13 @@ constexpr std::uint64_t bytesPerNotice = std::uint64_t{1} << 20;
 
 } // namespace
 
-/// Shared with the work in the background and on the main queue, which goes on when the handle is gone.
+/// The state is shared with the work in the background and on the main queue, which goes on when the handle
+/// is gone.
 struct LocalDownload::State {
     std::shared_ptr<platform::Queue> mainQueue;
     platform::DownloadHandlers handlers;
     std::atomic<bool> isCancelled = false;
-    std::uint64_t noticed = 0; ///< in the background only
+    std::uint64_t noticed = 0; ///< used in the background only
 };
 
 Continue LocalDownload::tell(
@@ -53,7 +54,7 @@ std::unique_ptr<LocalDownload> LocalDownload::start(
             : bringHere(layout, *store, path, [&](std::uint64_t done, std::optional<std::uint64_t> total) {
                   return tell(state, done, total);
               });
-        // The handlers go on the thread that made them.
+        // The handlers are destroyed on the thread that made them.
         state->mainQueue->async([state, error = std::move(error)] {
             if (!state->isCancelled.exchange(true) && state->handlers.completion)
                 state->handlers.completion(error);

@@ -11,10 +11,10 @@
 
 namespace host::drive {
 
-/// A download on a queue of the background, whose handlers run on the main queue.
+/// A download on a background queue. Its handlers run on the main queue.
 class LocalDownload : public platform::ItemDownload {
 public:
-    /// What downloads stand on; it outlives them.
+    /// The services that a download needs. They outlive it.
     struct Setting {
         DriveLayout layout;
         std::shared_ptr<CloudStore> store;

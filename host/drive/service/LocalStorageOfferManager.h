@@ -12,8 +12,8 @@
 
 namespace host::drive {
 
-/// The storage offer that the account's file describes. It is shown as low when the offer says so, and when
-/// less than a tenth of the file system is free.
+/// The storage offer in the account's file. Storage counts as low when the offer says so, or when less than a
+/// tenth of the file system is free.
 class LocalStorageOfferManager : public platform::StorageOfferManager,
                                  public std::enable_shared_from_this<LocalStorageOfferManager> {
 public:
@@ -22,11 +22,11 @@ public:
 
     bool fetchOfferIfNeeded() override;
     std::shared_ptr<const platform::StorageOffer> currentOffer() const override { return _offer; }
-    /// Opens a web address with the user's browser; every other target, and the action that the application
-    /// itself performs, answers false.
+    /// Opens a web address with the user's browser. Answers false for every other target, and for the action
+    /// that the application itself performs.
     bool performDefaultAction(const platform::StorageOfferLink& link) override;
 
-    /// Reads the offer again when it was read before.
+    /// Reads the offer again if it was read before.
     void accountFileChanged();
 
 private:

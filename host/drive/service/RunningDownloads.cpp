@@ -15,7 +15,7 @@ using platform::DownloadProgress;
 using platform::Error;
 using platform::weakly;
 
-/// What the one who asked holds.
+/// The handle that a caller of start() holds.
 class RunningDownloads::Handle : public platform::ItemDownload {
 public:
     Handle(std::weak_ptr<RunningDownloads> downloads, std::string path, Ticket ticket)
@@ -71,7 +71,8 @@ RunningDownloads::Ticket RunningDownloads::join(const std::string& path, Downloa
 
 void RunningDownloads::leave(const std::string& path, Ticket ticket)
 {
-    // What a handler holds may call here when it ends: not while the lock is held.
+    // The handlers are destroyed after the lock is released, because the objects that they hold may call here
+    // when they are destroyed.
     decltype(_running)::node_type ended;
     decltype(Running::listeners)::node_type listener;
     const std::lock_guard lock(_mutex);
@@ -128,7 +129,7 @@ void RunningDownloads::arrived(const std::string& path, const DownloadProgress& 
             running->second.progress = progress;
     }
     for (const auto& [ticket, handlers] : listenersOf(path)) {
-        // One of those before may have ended this one's waiting.
+        // An earlier handler may have cancelled this one's handle.
         if (handlers.progress && listens(path, ticket))
             handlers.progress(progress);
     }

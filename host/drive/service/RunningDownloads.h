@@ -15,8 +15,8 @@
 
 namespace host::drive {
 
-/// The downloads that are under way, one for each document however many ask for it. Posts
-/// Notification::DownloadsDidChange when one begins, gets on or ends. Any thread.
+/// The downloads that are under way, one for each document however many callers ask for it. Posts
+/// Notification::DownloadsDidChange when one begins, progresses or ends. Any thread.
 class RunningDownloads : public std::enable_shared_from_this<RunningDownloads> {
 public:
     RunningDownloads(
@@ -25,12 +25,12 @@ public:
     /// Joins the document's download, which begins with its first listener and ends with its last.
     std::unique_ptr<platform::ItemDownload> start(
         const std::string& path, platform::DownloadHandlers handlers);
-    /// The same for one that nobody keeps.
+    /// Joins the document's download without a handle to keep.
     void startUnkept(
         const std::string& path, std::function<void(const std::optional<platform::Error>&)> completion);
 
     std::optional<platform::DownloadProgress> progress(const std::string& path) const;
-    /// All who wait for it hear FileErrorCode::Cancelled.
+    /// Ends the download. All its listeners are told FileErrorCode::Cancelled.
     void cancel(const std::string& path);
 
 private:

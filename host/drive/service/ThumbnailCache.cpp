@@ -69,7 +69,8 @@ Image imageFrom(GdkPixbuf* pixbuf)
     return Image::fromPixels(width, height, 1, std::move(pixels));
 }
 
-// The entry for this version of the file; none when it is missing, or made from another version.
+// Answers the entry for this version of the file, or null when it is missing or was made from another
+// version.
 Pixbuf readEntry(const std::string& folder, const std::string& uri, platform::Date modified)
 {
     const auto path = entryPath(folder, uri);
@@ -92,7 +93,7 @@ Pixbuf scaledPicture(const std::string& path)
     return picture ? Pixbuf(gdk_pixbuf_apply_embedded_orientation(picture.get())) : nullptr;
 }
 
-// Under a temporary name first, so that other programs never read half of it.
+// Writes the entry under a temporary name first, so that other programs never read half of it.
 void writeEntry(const std::string& folder, GdkPixbuf* pixbuf, const std::string& uri, platform::Date modified)
 {
     static constexpr platform::Operation op{"-[ThumbnailCache writeEntry:]"};
@@ -100,7 +101,7 @@ void writeEntry(const std::string& folder, GdkPixbuf* pixbuf, const std::string&
     std::filesystem::create_directories(folder + "/xx-large", error);
     std::filesystem::permissions(folder + "/xx-large", std::filesystem::perms::owner_all, error);
     auto temporary = folder + "/xx-large/.tarrow-XXXXXX";
-    const int file = ::mkstemp(temporary.data()); // readable by its owner only, as the cache's rules ask
+    const int file = ::mkstemp(temporary.data()); // readable by its owner only, as the cache's rules demand
     if (file < 0)
         return;
     ::close(file);

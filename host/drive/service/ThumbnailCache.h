@@ -15,23 +15,23 @@ namespace host::drive {
 
 /// The thumbnails of 1024 pixels in the desktop's shared thumbnail cache (its "xx-large" folder). Any thread.
 ///
-/// One that is missing is made for pictures: at once on a background thread; on the main thread it is left to
-/// the background, and a later question finds it.
+/// Missing thumbnails are made for pictures. On a background thread that happens at once. On the main thread
+/// it is left to the background, and a later request finds the thumbnail.
 class ThumbnailCache : public std::enable_shared_from_this<ThumbnailCache> {
 public:
     static constexpr int pixelSize = 1024;
-    /// A picture with more pixels gets no thumbnail: decoding it would take too much memory.
+    /// A picture with more pixels gets no thumbnail, because decoding it would take too much memory.
     static constexpr std::int64_t mostPixels = 100'000'000;
 
     enum class IfMissing { Nothing, MakeFromPicture };
 
-    /// `folder`: the cache's root, `$XDG_CACHE_HOME/thumbnails`.
+    /// `folder` is the cache's root, `$XDG_CACHE_HOME/thumbnails`.
     static std::shared_ptr<ThumbnailCache> create(
         std::string folder, std::shared_ptr<platform::Dispatch> dispatch);
-    /// The root that the environment gives.
+    /// Answers the cache's root in this environment.
     static std::string sharedFolder();
 
-    /// The thumbnails of a file's present version; empty when there are none.
+    /// Answers the thumbnails of a file's current version; empty when there are none.
     platform::ThumbnailMap thumbnails(const platform::Url& url, platform::Date modified, IfMissing ifMissing);
 
 private:
