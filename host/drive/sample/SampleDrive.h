@@ -8,18 +8,18 @@
 
 namespace host::drive::sample {
 
-/// How a sample drive was made.
+/// The outcome of making a sample drive.
 struct Outcome {
-    int written = 0; ///< items that were not there before
-    std::optional<platform::Error> error; ///< why it ended early
+    int written = 0; ///< the number of items that did not exist before
+    std::optional<platform::Error> error; ///< the reason why it ended early
 };
 
 /// Fills a drive with a household's documents and signs its owner in: every kind of document that the preview
-/// shows, app libraries, promises, links, references, shared items, tags, names in several scripts. What is
-/// there already stays as it is, so it can be run again.
+/// shows, app libraries, promises, links, references, shared items, tags, names in several scripts. Existing
+/// items stay as they are, so it can be run again.
 Outcome makeSampleDrive(const DriveLayout& layout);
 
-/// The folder of the sample with a thousand items, and how many it has.
+/// The folder of the sample with a thousand items, and their number.
 inline constexpr const char* largeFolder = "BrindleDefault/Documents/Household/Receipts";
 inline constexpr int largeFolderCount = 1000;
 /// The folder that may not be read.

@@ -5,7 +5,7 @@
 
 #include <string>
 
-/// Texts of the sample drive.
+/// The texts of the sample drive.
 namespace host::drive::sample::texts {
 
 extern const char* const toDo;

@@ -15,20 +15,20 @@
 
 namespace host::drive::sample {
 
-/// What is to be known of a sample item beside its content.
+/// The attributes of a sample item beside its content.
 struct Traits {
-    int daysAgo = 30; ///< when it was last changed
+    int daysAgo = 30; ///< the age of its last change
     std::vector<std::string> tags;
-    std::optional<platform::SharedItemRole> sharedAs; ///< nothing: not shared
+    std::optional<platform::SharedItemRole> sharedAs; ///< absent: the item is not shared
     bool extensionHidden = false;
 };
 
-/// Puts items into a drive and never touches what is there already: an item whose name is taken, here or by a
-/// promise, is left out. Paths are relative to the documents area; folders that lead to an item are made. The
-/// first failure is kept, and after it nothing more is written.
+/// Adds items to a drive and never touches existing ones: an item whose name is taken, by an item or a
+/// promise, is left out. Paths are relative to the documents area; missing folders are made. After the first
+/// failure, which is kept, nothing more is written.
 class SampleWriter {
 public:
-    /// Content that is made only when the item is missing.
+    /// Makes the content; called only when the item is missing.
     using Content = std::function<std::string()>;
 
     explicit SampleWriter(const DriveLayout& layout)
@@ -40,13 +40,13 @@ public:
     int written() const { return _written; }
 
     void folder(const std::string& path, const Traits& traits = {});
-    /// A folder that its own user may not read.
+    /// Adds a folder that its own user may not read.
     void lockedFolder(const std::string& path);
     void document(const std::string& path, const Content& content, const Traits& traits = {});
-    /// An item whose content is in the cloud only.
+    /// Adds an item whose content is only in the cloud.
     void promised(const std::string& path, const Content& content, const Traits& traits = {});
     void link(const std::string& path, const std::string& target);
-    /// A file of the drive itself, by its absolute path.
+    /// Adds a file of the drive itself, by its absolute path.
     void record(const std::string& absolutePath, const std::string& content);
 
 private:
