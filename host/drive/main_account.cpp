@@ -15,8 +15,8 @@
 #include <string>
 #include <vector>
 
-// Signs people in to the drive on this machine and out again. Exit status: 0 done (or signed in), 1 nobody is
-// signed in, 2 wrong use, 3 failed.
+// This program signs people in to the drive on this machine and out again. Its exit status is 0 when done (or
+// signed in), 1 when nobody is signed in, 2 after wrong use, 3 after a failure.
 
 namespace {
 
@@ -40,7 +40,7 @@ int fail(const std::string& what, const platform::Error& error)
     return failed;
 }
 
-/// Makes the drive's home; says why when it cannot be made.
+/// Creates the drive's home, and prints the reason when that fails.
 bool prepareHome(const DriveLayout& layout)
 {
     layout.prepare();
