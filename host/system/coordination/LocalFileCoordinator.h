@@ -12,23 +12,23 @@
 
 namespace host::system {
 
-/// Coordination on this machine. A metadata read runs at once: what is being written lies under another name
-/// until it is whole, so a reader never sees half of it. Every other read and every write takes its place in
-/// a LockFile. Presenters are asked before the locks are taken, so that what they do to get ready does not
-/// wait for the writer that waits for them.
+/// Coordinates the access to files on this machine. A metadata read runs at once: a file has a temporary name
+/// until it is whole, so a reader never sees half of it. Every other read and every write locks its items in
+/// a LockFile. Presenters are asked before the locks are taken, so that their preparations do not wait for
+/// the writer that waits for them.
 class LocalFileCoordinator : public platform::FileCoordinator {
 public:
     struct Settings {
-        /// Shared by all processes that are to exclude each other; empty: this one alone.
+        /// The lock file of all processes that exclude each other; empty means this process alone.
         std::string lockFile = {};
-        /// How long each write waits for presenters.
+        /// The longest time for which each write waits for presenters.
         platform::Duration patience = std::chrono::seconds(3);
-        /// How long each read and write waits for others that have its item: longer than any save takes, and
-        /// no longer than a person waits for a program that hangs.
+        /// The longest time for which each read and write waits for others that have its item. It is longer
+        /// than any save takes, and no longer than a person waits for a program that hangs.
         platform::Duration lockPatience = std::chrono::seconds(10);
         /// The folder whose items are presented, and the queues on which changes by other processes are
-        /// looked for; a watch in the main loop (GLib's default main context) tells of them. Empty and null:
-        /// presenters hear of this process alone.
+        /// searched for; a watch in the main loop (GLib's default main context) reports them. When these are
+        /// empty and null, presenters are told of this process's changes alone.
         std::string root = {};
         std::shared_ptr<platform::Dispatch> dispatch = nullptr;
         /// Runs on the writer's thread before it waits for presenters.

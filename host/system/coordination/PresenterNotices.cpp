@@ -14,7 +14,7 @@ using platform::Error;
 using platform::FilePresenter;
 using platform::Url;
 
-/// The answers that one write waits for. Presenters may answer late, twice or never.
+/// The answers for which one write waits. Presenters may answer late, twice or never.
 class PresenterNotices::Answers {
 public:
     void expect()
@@ -50,7 +50,8 @@ private:
 
 namespace {
 
-/// One presenter's answer: the first counts, and when everything that could give it is gone it is "nothing".
+/// One presenter's answer. The first call counts. When every copy of the answer is destroyed without a call,
+/// the answer is "nothing".
 class Answer {
 public:
     explicit Answer(std::function<void(const std::optional<Error>&)> receive)
@@ -78,8 +79,8 @@ Url moved(const Url& url, const Url& from, const Url& to)
 
 } // namespace
 
-// A presenter takes itself off the list when it ends. What is looked at here may be held by nobody else by
-// now, so it is let go only after the lock.
+// A presenter removes itself from the list when it is destroyed. The last reference may be the one that is
+// used here, so it is released only after the lock.
 
 void PresenterNotices::add(const std::shared_ptr<FilePresenter>& presenter)
 {
@@ -126,7 +127,7 @@ void PresenterNotices::tell(
 
 std::vector<PresenterNotices::Presented> PresenterNotices::presented() const
 {
-    // Presenters take locks of their own to answer; none of ours may be held meanwhile.
+    // Presenters take their own locks to answer, so none of ours may be held meanwhile.
     std::vector<Presented> all;
     for (const auto& weak : presenters()) {
         const auto presenter = weak.lock();

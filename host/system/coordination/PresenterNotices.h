@@ -15,11 +15,11 @@
 
 namespace host::system {
 
-/// The presenters of this process, and what they are told. Any thread.
+/// The presenters of this process, and the calls to them. Any thread.
 class PresenterNotices {
 public:
-    /// `patience` is how long one write waits for all presenters that it asks; `beforeWaiting` runs on the
-    /// writer's thread before it waits (null: nothing).
+    /// `patience` is the longest time for which one write waits for all presenters that it asks.
+    /// `beforeWaiting` runs on the writer's thread before it waits (null: nothing).
     PresenterNotices(platform::Duration patience, std::function<void()> beforeWaiting)
         : _patience(patience)
         , _beforeWaiting(std::move(beforeWaiting))
@@ -30,16 +30,17 @@ public:
     void remove(const platform::FilePresenter& presenter);
 
     std::vector<std::weak_ptr<platform::FilePresenter>> presenters() const;
-    /// Calls a presenter in its queue, unless it was removed.
+    /// Calls a presenter on its queue, unless it was removed.
     void tell(const std::weak_ptr<platform::FilePresenter>& presenter,
         std::function<void(platform::FilePresenter&)> call) const;
 
-    /// Asks the presenters of an item, of what lies below it and of the folders above it to prepare for its
-    /// deletion, and waits for them. Answers the first error that one of them gave.
+    /// Asks the presenters of an item, of everything below it and of the folders above it to prepare for its
+    /// deletion, and waits for them. Answers the first error of one of them.
     std::optional<platform::Error> askForDeletion(const platform::Url& url);
-    /// Tells the presenters of an item and of what lies below it that it is about to move, and waits.
+    /// Tells the presenters of an item and of everything below it that it is about to be moved, and waits.
     void announceMove(const platform::Url& from, const platform::Url& to);
-    /// Tells the same presenters where the item is now. They are those that were there before the move.
+    /// Tells the same presenters the new place of the item. They are the ones that were registered before the
+    /// move.
     void tellOfMove(const platform::Url& from, const platform::Url& to);
     /// Tells the presenters of an item and of the folders above it that it may have changed.
     void tellOfChange(const platform::Url& url);

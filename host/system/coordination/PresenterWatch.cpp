@@ -16,11 +16,11 @@ namespace {
 using platform::Duration;
 using platform::weakly;
 
-// A program that saves makes several changes at once. What is missing may be on its way back: a save that
-// puts the old version aside first takes as long as writing the new one does.
+// A program that saves makes several changes at once. A missing item may come back soon, because a save that
+// first moves the old version away takes as long as writing the new one.
 constexpr Duration changesSettle = std::chrono::milliseconds(50);
 constexpr Duration missingSettles = std::chrono::milliseconds(250);
-// Where the system has no watches left.
+// The items are polled when the system has no watches left.
 constexpr Duration pollPeriod = std::chrono::seconds(5);
 
 bool isSame(const std::weak_ptr<platform::FilePresenter>& a, const std::weak_ptr<platform::FilePresenter>& b)
@@ -68,7 +68,8 @@ void PresenterWatch::askAgain()
     lookLater(changesSettle);
 }
 
-/// Who presents what. Presenters take locks of their own to answer; none of ours may be held meanwhile.
+/// Answers which presenter presents which item. Presenters take their own locks to answer, so none of ours
+/// may be held meanwhile.
 std::vector<PresenterWatch::Asked> PresenterWatch::askPresenters() const
 {
     std::vector<Asked> all;
@@ -78,7 +79,8 @@ std::vector<PresenterWatch::Asked> PresenterWatch::askPresenters() const
             continue;
         if (const auto url = presenter->presentedItemURL())
             all.push_back({weak, url->path()});
-        // Whoever owns it may have let go meanwhile, and what owns screens must end where screens live.
+        // The owner may have released the presenter meanwhile, and a presenter that owns screens must be
+        // destroyed on the main thread.
         _dispatch->mainQueue()->async([held = std::move(presenter)] {});
     }
     return all;
@@ -125,7 +127,7 @@ void PresenterWatch::readEvents()
     lookLater(changesSettle);
 }
 
-/// Hands what happened to those whom it concerns.
+/// Passes the events to the presenters that they concern.
 void PresenterWatch::markEvents()
 {
     if (!_watches)
@@ -141,7 +143,7 @@ bool PresenterWatch::isOwn(const std::string& path) const
     return std::ranges::any_of(_ownPaths, [&](const auto& own) { return isPathWithin(path, own); });
 }
 
-/// Whether to look now: in the middle of a write of this process it would see half of what the write does.
+/// Answers whether to look now. In the middle of a write of this process a look would see half of the write.
 bool PresenterWatch::mustLook(const WatchedPresenter& presenter) const
 {
     const auto& path = presenter.item().path();
@@ -149,7 +151,7 @@ bool PresenterWatch::mustLook(const WatchedPresenter& presenter) const
         && std::ranges::none_of(_ownPaths, [&](const auto& own) { return isPathWithin(own, path); });
 }
 
-/// Sees to it that what must be looked at is, once.
+/// Schedules one look when a presenter needs it.
 void PresenterWatch::lookLater(Duration delay)
 {
     const bool isNeeded =
@@ -203,7 +205,7 @@ void PresenterWatch::beginOwnWrite(std::span<const OwnWrite> writes)
 void PresenterWatch::endOwnWrite(std::span<const OwnWrite> writes)
 {
     const std::lock_guard lock(_mutex);
-    // Everything that this write caused is in the kernel's queue by now.
+    // All events of this write are in the kernel's queue by now.
     markEvents();
     for (const auto& write : writes)
         _ownPaths.erase(std::ranges::find(_ownPaths, write.path));

@@ -15,17 +15,16 @@
 
 namespace host::system {
 
-/// Tells presenters what other processes do to their items, coordinated or not, after it was done. Any
-/// thread.
+/// Tells presenters of the changes that other processes made to their items, coordinated or not. Any thread.
 ///
-/// Events of inotify only mark the presenters that must look; what is told comes of a look at the disk 50 ms
-/// after the first event, so that one save is told once. Each presented item is held by a descriptor that
-/// reads nothing, so the kernel says where it went when its place is empty; a quarter of a second later that
-/// is told as a move or as a deletion. What stands at the place counts: a save that replaces the file, a save
-/// that leaves a backup, and an eviction are changes. A drive that disappears as a whole has deleted nothing.
-/// Writes of this process are left out, because they are taken as known at their end, inside their locks.
-/// When the kernel lost events every presenter looks; when it has no watches left they look every five
-/// seconds, which one line of the log says.
+/// Events of inotify only mark the presenters that must look. The notices come from a look at the disk 50 ms
+/// after the first event, so that one save leads to one notice. Each presented item is held by a descriptor
+/// that reads nothing, so the kernel tells where the item is when its place is empty; a quarter of a second
+/// later that is reported as a move or as a deletion. The item at the place counts: a save that replaces the
+/// file, a save that leaves a backup, and an eviction are changes. A drive that disappears as a whole has
+/// deleted nothing. Writes of this process are left out, because their results are taken as known at their
+/// end, inside their locks. When the kernel has lost events every presenter looks. When the system has no
+/// watches left the presenters look every five seconds, and one line is logged.
 class PresenterWatch : public std::enable_shared_from_this<PresenterWatch> {
 public:
     struct OwnWrite {
@@ -37,15 +36,15 @@ public:
     static std::shared_ptr<PresenterWatch> create(std::shared_ptr<PresenterNotices> notices,
         std::shared_ptr<platform::Dispatch> dispatch, std::string root);
 
-    /// A presenter came, left, or presents another item: it is asked soon.
+    /// A presenter was added or removed, or presents another item, so the presenters are asked soon.
     void presentersChanged();
-    /// After this nobody is told anything more.
+    /// Stops the watch. No presenter is told anything afterwards.
     void stop();
 
     /// Around each write of this process, inside its locks. Its presenters hear of it otherwise.
     void beginOwnWrite(std::span<const OwnWrite> writes);
     void endOwnWrite(std::span<const OwnWrite> writes);
-    /// Inside such a write: the item was moved.
+    /// Says inside such a write that the item was moved.
     void ownMove(const std::string& from, const std::string& to);
 
 private:
@@ -59,13 +58,13 @@ private:
     std::vector<Asked> askPresenters() const;
     std::unique_ptr<FolderWatches> makeWatches();
 
-    // Steps on the queue.
+    // These are steps that run on the queue.
     void askAgain();
     void readEvents();
     void look();
     void poll();
 
-    // With the mutex held.
+    // These are called with the mutex locked.
     void update(const std::vector<Asked>& asked);
     void markEvents();
     void lookLater(platform::Duration delay);
@@ -79,10 +78,10 @@ private:
     const std::string _root;
     std::atomic_bool _isReading = false, _isStopped = false;
 
-    std::mutex _mutex; ///< for everything below; held while the disk is looked at
+    std::mutex _mutex; ///< guards everything below; locked while the disk is read
     std::unique_ptr<FolderWatches> _watches;
     std::vector<WatchedPresenter> _presenters;
-    std::vector<std::string> _ownPaths; ///< being written now
+    std::vector<std::string> _ownPaths; ///< the paths that this process is writing now
     bool _isLookComing = false, _isPollComing = false;
 };
 
