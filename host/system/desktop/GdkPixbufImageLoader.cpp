@@ -51,7 +51,7 @@ std::optional<Error> checkFile(const std::string& path, const ImageLimits& limit
     struct stat status { };
     if (::stat(path.c_str(), &status) != 0)
         return errno == ENOENT ? Error(platform::FileErrorCode::NoSuchFile) : systemError(errno, path);
-    // Anything but a regular file could keep the reader waiting.
+    // Only a regular file is opened, because reading a pipe or a device could block for ever.
     if (!S_ISREG(status.st_mode))
         return imageError(ImageErrorCode::Damaged);
     if (static_cast<std::uint64_t>(status.st_size) > limits.maxFileBytes)
@@ -64,7 +64,7 @@ struct PixelSize {
     bool operator==(const PixelSize&) const = default;
 };
 
-/// The largest size of this shape that the limits allow.
+/// Answers the largest size of this shape within the limits.
 PixelSize fitted(PixelSize size, const ImageLimits& limits)
 {
     const double width = size.width, height = size.height;
@@ -76,7 +76,7 @@ PixelSize fitted(PixelSize size, const ImageLimits& limits)
     return {shrunk(size.width), shrunk(size.height)};
 }
 
-/// What to decode to, as long as nobody knows whether the picture lies on its side.
+/// Answers the size to decode to while it is not known whether the picture has to be turned.
 PixelSize fittedEitherWay(PixelSize size, const ImageLimits& limits)
 {
     const auto lying = fitted({size.height, size.width}, limits);
@@ -84,7 +84,7 @@ PixelSize fittedEitherWay(PixelSize size, const ImageLimits& limits)
     return lying.height > standing.width ? PixelSize{lying.height, lying.width} : standing;
 }
 
-/// The picture's own size, by its header.
+/// Reads the picture's own size from its header.
 Result<PixelSize> sizeInFile(const std::string& path, const ImageLimits& limits)
 {
     int width = 0, height = 0;
@@ -95,7 +95,7 @@ Result<PixelSize> sizeInFile(const std::string& path, const ImageLimits& limits)
     return PixelSize{width, height};
 }
 
-/// Turns the picture as its camera noted, and makes it as small as the limits want.
+/// Turns the picture as its camera noted, and scales it down to the limits.
 Pixbuf upright(const GdkPixbuf* decoded, const ImageLimits& limits)
 {
     Pixbuf turned(gdk_pixbuf_apply_embedded_orientation(const_cast<GdkPixbuf*>(decoded)));
@@ -132,7 +132,7 @@ Image imageOf(const GdkPixbuf* pixbuf, double scale)
     return Image::fromPixels(width, height, scale, std::move(pixels));
 }
 
-/// A file that is read piece by piece, so that the reading can be given up.
+/// A file that is read piece by piece, so that the reading can be cancelled.
 class PictureFile {
 public:
     explicit PictureFile(const std::string& path)
@@ -141,7 +141,7 @@ public:
     }
     bool isOpen() const { return static_cast<bool>(_file); }
 
-    /// Nothing after the end or a fault.
+    /// Answers nothing after the end or an error.
     std::string_view next()
     {
         ssize_t count = 0;
@@ -156,7 +156,7 @@ private:
     std::array<char, 64 << 10> _buffer{};
 };
 
-/// The library's decoder. Being cancelled, it ends without looking at what it has.
+/// The library's decoder. When it is cancelled, it ends without looking at the bytes so far.
 class Decoder {
 public:
     explicit Decoder(PixelSize size)
@@ -178,7 +178,7 @@ public:
         const auto* data = reinterpret_cast<const guchar*>(bytes.data());
         return gdk_pixbuf_loader_write(_loader.get(), data, bytes.size(), nullptr) != FALSE;
     }
-    /// False: the picture is not whole.
+    /// Answers false when the picture is not complete.
     bool end()
     {
         return std::exchange(_ended, true) || gdk_pixbuf_loader_close(_loader.get(), nullptr) != FALSE;
@@ -209,7 +209,7 @@ Result<Decoded> decode(const std::string& path, PixelSize size, const Cancelled&
     if (!file.isOpen())
         return systemError(errno, path);
     Decoder decoder(size);
-    std::string gif; // the bytes, while they may be an animation's
+    std::string gif; // the bytes, as long as they may be an animation's
     JpegEnd jpegEnd;
     bool breaksOff = false, isFirst = true;
     for (auto piece = file.next(); !piece.empty(); piece = file.next()) {
@@ -230,7 +230,7 @@ Result<Decoded> decode(const std::string& path, PixelSize size, const Cancelled&
     return Decoded{std::move(animation), std::max<std::size_t>(1, gifFrameCount(gif)), breaksOff};
 }
 
-// The library's animations know no other clock than this type that its own library discourages.
+// The library's animations know only this type of time, which GLib has deprecated.
 G_GNUC_BEGIN_IGNORE_DEPRECATIONS
 using AnimationTime = GTimeVal;
 G_GNUC_END_IGNORE_DEPRECATIONS

@@ -7,7 +7,7 @@
 
 namespace host::system {
 
-/// Decodes pictures with the desktop's picture library, in the formats that are installed for it.
+/// Decodes pictures with GdkPixbuf, in the formats that are installed for it.
 class GdkPixbufImageLoader : public platform::ImageLoader {
 public:
     platform::Result<platform::Image> load(

@@ -23,7 +23,7 @@ public:
     }
     void skip(std::size_t count) { _at += count; }
     bool isAtEnd() const { return _at >= _bytes.size(); }
-    /// Data comes in blocks behind their lengths, up to an empty one.
+    /// Skips data, which comes in blocks behind their lengths, up to an empty one.
     void skipBlocks()
     {
         while (!isAtEnd() && at(0) != 0)
@@ -56,7 +56,7 @@ std::size_t gifFrameCount(std::string_view bytes)
             reader.skip(2);
         } else if (mark == frameMark) {
             ++frames;
-            // The frame's own colours, and the width of its codes.
+            // A frame begins with its own colours and the width of its codes.
             reader.skip(1 + descriptorSize + colorTableSize(reader.at(descriptorSize)) + 1);
         } else {
             return frames;

@@ -8,8 +8,8 @@
 
 namespace host::system {
 
-/// Counts the frames of a GIF without decoding them; 0 for anything else. A file that breaks off has those
-/// that begin.
+/// Counts the frames of a GIF without decoding them; 0 for any other file. In a truncated file every frame
+/// counts that begins.
 std::size_t gifFrameCount(std::string_view bytes);
 
 } // namespace host::system

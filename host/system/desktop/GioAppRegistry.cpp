@@ -27,7 +27,7 @@ struct Unref {
 };
 using App = std::unique_ptr<GAppInfo, Unref>;
 
-/// Takes over a list and its apps.
+/// Takes over a list and the apps in it.
 std::vector<App> owned(GList* list)
 {
     std::vector<App> apps;
@@ -86,7 +86,8 @@ bool declaresAsOwn(const App& app, const std::string& mimeType)
     return std::any_of(types.get(), types.get() + count, [&](const char* type) { return type == mimeType; });
 }
 
-/// The app that the person prefers for just this type; one that only opens a more general type is none.
+/// Answers the user's default app for just this type. An app that only opens a more general type does not
+/// count.
 App defaultApp(const std::string& mimeType, const std::vector<App>& claimants)
 {
     App app(g_app_info_get_default_for_type(mimeType.c_str(), FALSE));
@@ -117,7 +118,7 @@ std::optional<std::string> GioAppRegistry::mimeTypeOf(const Url& url) const
 {
     const auto type = _types->typeForExtension(url.pathExtension());
     auto mimeType = type ? _types->mimeType(*type) : std::nullopt;
-    // A package without a type of its own is no matter for the file manager.
+    // A package without a type of its own is not opened with the file manager, although it is a folder.
     return mimeType && *mimeType != "inode/directory" ? std::move(mimeType) : std::nullopt;
 }
 

@@ -15,13 +15,13 @@ namespace host::system {
 
 class MimeTypeRegistry;
 
-/// The desktop entries of this machine. The person's default app for a document's MIME type ranks "Owner",
-/// when it claims that very type, and so does an app whose entry lists the type under "X-Tarrow-OwnedTypes";
-/// other claimants rank "Alternate". An app opens documents in place when its command takes files or URLs and
-/// needs no terminal.
+/// The apps of this machine, by its desktop entries. The user's default app for a document's MIME type ranks
+/// "Owner" when it claims that very type, and so does an app whose entry lists the type under
+/// "X-Tarrow-OwnedTypes". Other claimants rank "Alternate". An app opens documents in place when its command
+/// takes files or URLs and needs no terminal.
 class GioAppRegistry : public platform::AppRegistry {
 public:
-    /// Makes what a launch needs to bring the app's window to the front; null: nothing.
+    /// Makes the context with which a launched app can bring its window to the front; null means none.
     using LaunchContext = std::function<std::shared_ptr<GAppLaunchContext>()>;
 
     GioAppRegistry(std::shared_ptr<const MimeTypeRegistry> types, std::string ownIdentifier,

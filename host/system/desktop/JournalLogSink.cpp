@@ -48,7 +48,7 @@ const char* journalPriority(LogLevel level)
     return priorities[static_cast<int>(level)];
 }
 
-/// A message stays one line, whatever the names in it hold.
+/// Removes control characters, so that a message stays one line whatever the names in it contain.
 std::string withoutControlCharacters(const std::string& text)
 {
     std::string out;
@@ -72,7 +72,7 @@ void writeWhole(int descriptor, std::string_view text)
         if (written < 0 && errno == EINTR)
             continue;
         if (written <= 0)
-            return; // nowhere is left to report it
+            return; // there is no other place to report it
         text.remove_prefix(static_cast<std::size_t>(written));
     }
 }

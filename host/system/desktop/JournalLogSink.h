@@ -9,9 +9,9 @@
 
 namespace host::system {
 
-/// What the environment asks of the log. TARROW_LOG_LEVEL is "debug", "info", "warning" or "error"
-/// (otherwise debug in development builds, else info); TARROW_LOG_PRIVATE=1 shows private values and 0 hides
-/// them (otherwise shown in development builds only).
+/// The settings that the environment gives the log. TARROW_LOG_LEVEL is "debug", "info", "warning" or "error"
+/// (otherwise debug in development builds, else info). TARROW_LOG_PRIVATE=1 shows private values and 0 hides
+/// them (otherwise they are shown in development builds only).
 struct LogSettings {
     platform::LogLevel lowest;
     platform::PrivateValues privacy;
@@ -19,8 +19,8 @@ struct LogSettings {
     static LogSettings fromEnvironment();
 };
 
-/// Writes the log to the journal when standard error is one, with the level, the operation and the user
-/// action as fields, and otherwise to standard error as text. A line is one write.
+/// Writes the log to the journal when standard error is connected to it, with the level, the operation and
+/// the user action as fields, and otherwise to standard error as text. Each line is one write.
 class JournalLogSink : public platform::LogSink {
 public:
     explicit JournalLogSink(platform::PrivateValues privacy);
@@ -35,7 +35,7 @@ private:
     bool _isJournal;
 };
 
-/// Makes the sink that the environment asks for and installs it with its level. Call it first in main.
+/// Makes the sink that the environment asks for and installs it with its level. Call this first in main.
 void installSystemLog();
 
 } // namespace host::system

@@ -32,7 +32,8 @@ void JpegEnd::feed(std::string_view piece)
         lookForEnd();
 }
 
-/// Before the picture lie segments with their lengths; one may hold a small picture with an end of its own.
+/// Skips the segments before the picture by their lengths, because one may contain a small picture with an
+/// end of its own.
 void JpegEnd::skipSegments()
 {
     std::size_t at = 0;

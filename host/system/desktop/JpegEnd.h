@@ -8,12 +8,12 @@
 
 namespace host::system {
 
-/// Looks through the bytes of a JPEG file as they come, for the mark that ends the picture. A file without it
-/// breaks off, though the decoder fills up what is missing and calls it whole.
+/// Searches the bytes of a JPEG file, as they arrive, for the marker that ends the picture. A file without it
+/// is truncated, although the decoder fills the missing part and reports no error.
 class JpegEnd {
 public:
     void feed(std::string_view piece);
-    /// Whether this is a JPEG file whose end has not come.
+    /// Answers whether this is a JPEG file whose end has not arrived.
     bool isMissing() const { return _place != Place::Elsewhere && _place != Place::Ended; }
 
 private:
@@ -23,7 +23,7 @@ private:
     void lookForEnd();
 
     Place _place = Place::Start;
-    std::string _bytes; ///< not looked at yet
+    std::string _bytes; ///< the bytes that were not searched yet
 };
 
 } // namespace host::system

@@ -19,13 +19,13 @@ namespace {
 
 // No extension in use is longer, and longer ones need no place in memory.
 constexpr std::size_t maximumExtension = 32;
-// Names that a program makes up must not fill the memory.
+// The number of answers is limited, so that made-up names cannot fill the memory.
 constexpr std::size_t maximumCachedAnswers = 4096;
 constexpr std::string_view unknownMimeType = "application/octet-stream";
 
 using GlibText = std::unique_ptr<char, decltype(&g_free)>;
 
-/// An extension in lower case, without allocating; empty for what can be none.
+/// An extension in lower case, without an allocation; empty when it cannot be one.
 class LowerCase {
 public:
     explicit LowerCase(std::string_view extension)
@@ -45,12 +45,12 @@ private:
 
 } // namespace
 
-/// What was answered to the texts that were asked for, unknown ones included.
+/// Keeps the answers for the texts that were asked for, including unknown ones.
 class MimeTypeRegistry::AnswerCache {
 public:
     using Answer = std::optional<std::string>;
 
-    /// Whether the text was asked for before; `answer` is then what the answer was.
+    /// Answers whether the text was asked for before, and sets `answer` then.
     bool find(std::string_view text, Answer& answer) const
     {
         const std::shared_lock lock(_mutex);
@@ -136,7 +136,7 @@ std::optional<std::string> MimeTypeRegistry::description(std::string_view type) 
         return description;
     const auto mime = mimeType(type);
     const GlibText text(mime ? g_content_type_get_description(mime->c_str()) : nullptr, g_free);
-    // The database calls what it does not know "unknown", which says nothing where a kind is named.
+    // The database describes unknown types as "unknown", which is too short where a kind is named.
     if (mime == unknownMimeType)
         description = translated("Unknown kind");
     else if (text)
@@ -151,7 +151,7 @@ std::string MimeTypeRegistry::iconName(std::string_view type) const
         && !_graph->conformsTo(type, platform::typeIdentifier::package))
         return "folder";
     const auto mime = mimeType(type);
-    // Themes have few icons of single types, and all of the general ones.
+    // Themes have icons for few single types, but for all general ones.
     const GlibText name(mime ? g_content_type_get_generic_icon_name(mime->c_str()) : nullptr, g_free);
     return name ? name.get() : "text-x-generic";
 }

@@ -13,9 +13,9 @@ namespace host::system {
 
 class TypeGraph;
 
-/// Types by the table of TypeTable.h and, beyond it, by the shared MIME database: there "dyn.mime.text/x-ada"
-/// is the identifier of the MIME type "text/x-ada". Everything is judged by names. Any thread; what was asked
-/// once is answered from memory.
+/// Types by the table of TypeTable.h and, beyond it, by the shared MIME database, where "dyn.mime.text/x-ada"
+/// is the identifier of the MIME type "text/x-ada". Everything is decided by names. Any thread; repeated
+/// questions are answered from memory.
 class MimeTypeRegistry : public platform::TypeRegistry {
 public:
     MimeTypeRegistry();
@@ -26,11 +26,11 @@ public:
     std::optional<std::string> description(std::string_view type) const override;
     std::string iconName(std::string_view type) const override;
 
-    /// Whether a folder with this extension is shown as one document.
+    /// Answers whether a folder with this extension is shown as one document.
     bool isPackageExtension(std::string_view extension) const;
-    /// The preferred MIME type of a type; nothing for one that has none.
+    /// Answers the preferred MIME type of a type, or nothing for a type without one.
     std::optional<std::string> mimeType(std::string_view type) const;
-    /// The type of a MIME type.
+    /// Answers the type of a MIME type.
     std::string typeForMimeType(std::string_view mimeType) const;
 
 private:

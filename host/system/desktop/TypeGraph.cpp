@@ -14,7 +14,8 @@ namespace host::system {
 
 namespace {
 
-// The MIME database has about a thousand types; more dynamic ones than that are made up.
+// The MIME database has about a thousand types, so more dynamic types than this are made up and not
+// remembered.
 constexpr std::size_t maximumDynamicTypes = 2048;
 
 template <typename Map>
@@ -24,7 +25,7 @@ const TypeRow* find(const Map& map, std::string_view key)
     return found == map.end() ? nullptr : found->second;
 }
 
-/// What the first half of a MIME type says.
+/// Answers the type for the first half of a MIME type.
 std::string_view broadType(std::string_view mimeType)
 {
     static constexpr std::pair<std::string_view, std::string_view> broad[] = {{"text/", "public.plain-text"},
@@ -98,7 +99,7 @@ TypeGraph::Ancestors TypeGraph::ancestorsOfDynamic(std::string_view mimeType) co
     add(broadType(mimeType));
     const std::string mime(mimeType);
     for (const auto& [known, row] : _byMimeType) {
-        // Everything is a kind of octet stream there, folders too.
+        // In the MIME database everything is a kind of octet stream, also folders.
         if (known != "application/octet-stream" && g_content_type_is_a(mime.c_str(), known.c_str()))
             add(row->identifier);
     }

@@ -15,7 +15,7 @@ namespace host::system {
 
 struct TypeRow;
 
-/// Lets a map of texts be asked without making a text.
+/// Allows a look-up in a map of texts without making a text.
 struct TextHash {
     using is_transparent = void;
     std::size_t operator()(std::string_view text) const { return std::hash<std::string_view>()(text); }
@@ -23,16 +23,16 @@ struct TextHash {
 template <typename T>
 using TextMap = std::unordered_map<std::string, T, TextHash, std::equal_to<>>;
 
-/// Which type is a kind of which. Any thread.
+/// Answers which type is a kind of which. Any thread.
 class TypeGraph {
 public:
     static constexpr std::string_view dynamicPrefix = "dyn.mime.";
 
     TypeGraph();
 
-    /// The table's row of a type; null for a type that is not in it.
+    /// Answers the table's row of a type, or null for a type that is not in the table.
     const TypeRow* row(std::string_view type) const;
-    /// The table's row of a MIME type; null for one that is not in it.
+    /// Answers the table's row of a MIME type, or null when there is none.
     const TypeRow* rowOfMimeType(std::string_view mimeType) const;
     const TypeRow* rowOfExtension(std::string_view extension) const;
 
@@ -50,7 +50,7 @@ private:
     mutable TextMap<std::shared_ptr<const Ancestors>> _dynamic;
 };
 
-/// The parts of a list that is separated by blanks.
+/// Answers the parts of a list that is separated by blanks.
 std::vector<std::string_view> words(std::string_view list);
 
 } // namespace host::system

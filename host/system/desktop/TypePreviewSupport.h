@@ -13,7 +13,8 @@ class TypeRegistry;
 
 namespace host::system {
 
-/// Previews pictures, texts and sources, PDF documents, sound and movies, told by the name's extension.
+/// Previews pictures, texts and source code, PDF documents, sounds and films, which it recognises by the
+/// name's extension.
 class TypePreviewSupport : public platform::PreviewSupport {
 public:
     explicit TypePreviewSupport(std::shared_ptr<const platform::TypeRegistry> types)

@@ -8,15 +8,15 @@
 
 namespace host::system {
 
-/// One kind of item that has an identifier of its own. Lists are separated by blanks.
+/// One type that has an identifier of its own. Lists are separated by blanks.
 struct TypeRow {
     std::string_view identifier;
-    std::string_view parents; ///< identifiers that it is a kind of
-    std::string_view mimeTypes; ///< of the shared MIME database, the preferred one first
-    std::string_view extensions; ///< in lower case; an extension stands in one row only
+    std::string_view parents; ///< identifiers of the types of which it is a kind
+    std::string_view mimeTypes; ///< names in the shared MIME database, the preferred one first
+    std::string_view extensions; ///< in lower case; each extension stands in one row only
 };
 
-/// All of them, parents before their kinds.
+/// Answers all rows, parents before their kinds.
 std::span<const TypeRow> typeTable();
 
 } // namespace host::system
