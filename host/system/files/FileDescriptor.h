@@ -9,11 +9,11 @@
 
 namespace host::system {
 
-/// Owns an open descriptor and closes it at the end. Movable only.
+/// Owns an open descriptor and closes it in its destructor. Movable only.
 class FileDescriptor {
 public:
     FileDescriptor() = default;
-    /// Takes over what a system call answered; a negative number is "none".
+    /// Takes over the result of a system call; a negative number means "none".
     explicit FileDescriptor(int descriptor)
         : _descriptor(descriptor)
     {

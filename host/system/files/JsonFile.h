@@ -15,24 +15,24 @@
 
 namespace host::system {
 
-/// What a JSON text may be at most; a text beyond it is not parsed.
+/// The limits for a JSON text. A text beyond them is not parsed.
 struct JsonLimits {
     std::size_t bytes = 4 * 1024 * 1024;
     int depth = 64; ///< arrays and objects within each other
 };
 
-/// A text as JSON; null for anything malformed or beyond the limits. Never throws.
+/// Parses a text as JSON. Answers null for a malformed text or one beyond the limits. It never throws.
 std::unique_ptr<nlohmann::json> parseJson(std::string_view text, JsonLimits limits = {});
-/// JSON as text. Bytes that are no UTF-8 become replacement characters; never throws.
+/// Answers JSON as text. Bytes that are not UTF-8 become replacement characters. It never throws.
 std::string jsonText(const nlohmann::json& value);
 
-/// A small JSON file that the program keeps. Any thread, one at a time for each file.
+/// A small JSON file of the program. Any thread, one at a time for each file.
 class JsonFile {
 public:
     enum class State {
-        Read, ///< there, and well
-        Absent, ///< not there, or damaged and kept aside: the file may be written
-        Unreadable, ///< there, but not for us now: it must not be written
+        Read, ///< it exists and is well-formed
+        Absent, ///< it is missing, or was damaged and renamed away, so it may be written
+        Unreadable, ///< it exists but cannot be read now, so it must not be written
     };
     struct Content {
         State state;
@@ -47,13 +47,12 @@ public:
 
     const std::string& path() const { return _path; }
 
-    /// Reads the file. A damaged one is renamed to "NAME.damaged" (or ".damaged-2" and so on) and named in
-    /// one line of the log, with the reason; so is one that cannot be read.
+    /// Reads the file. A damaged file is renamed to "NAME.damaged" (or ".damaged-2" and so on), and one line
+    /// with the reason is logged. A line is also logged for a file that cannot be read.
     Content read() const;
-    /// Renames a file away whose JSON is well but whose meaning is damaged, as read() does.
+    /// Renames a file away, like read() does, whose JSON is well-formed but whose content is damaged.
     State setAside(std::string_view reason) const;
-    /// Replaces the file (see writeFileAtomically), after making the folders that lead to it, for the user
-    /// alone.
+    /// Replaces the file (see writeFileAtomically). Missing folders above it are made, for the user alone.
     std::optional<platform::Error> write(const nlohmann::json& value) const;
 
 private:

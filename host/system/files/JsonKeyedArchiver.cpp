@@ -26,7 +26,7 @@ namespace {
 
 constexpr int formatVersion = 1;
 constexpr int maximumDepth = 32;
-// A level of a dictionary takes at most three levels of JSON: the object, its list, the pair.
+// A level of a dictionary takes at most three levels of JSON: the object, its list and the pair.
 constexpr JsonLimits limits{64 * 1024, 3 * maximumDepth + 3};
 
 json tagged(const char* kind, json content)

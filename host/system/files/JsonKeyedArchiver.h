@@ -7,8 +7,8 @@
 
 namespace host::system {
 
-/// Archives as JSON: {"version": 1, "root": value}. Values that JSON has no kind for are objects with their
-/// kind under "$" and their content under "v".
+/// Archives values as JSON: {"version": 1, "root": value}. A value of a type that JSON does not have becomes
+/// an object with its type under "$" and its content under "v".
 class JsonKeyedArchiver : public platform::KeyedArchiver {
 public:
     platform::Data archive(const platform::PropertyValue& value) const override;

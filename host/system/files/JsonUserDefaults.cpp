@@ -23,7 +23,7 @@ constexpr int formatVersion = 1;
 
 } // namespace
 
-/// The values and the file behind them; shared with the write that is under way.
+/// The values and their file, which are shared with a write that is under way.
 class JsonUserDefaults::Store {
 public:
     explicit Store(std::string path)
@@ -39,7 +39,7 @@ public:
         return found == _values.end() ? std::nullopt : base64Decoded(found->second);
     }
 
-    /// Whether a write must follow; not when one already waits.
+    /// Answers whether a write has to be posted, which is not so when one is already waiting.
     bool set(const std::string& key, const std::optional<Data>& value)
     {
         const std::lock_guard lock(_mutex);
@@ -51,7 +51,7 @@ public:
         return !std::exchange(_writeWaits, true);
     }
 
-    /// Writes what changed since the last write.
+    /// Writes the changes since the last write.
     void write()
     {
         static constexpr platform::Operation op{"-[JsonUserDefaults write]"};
@@ -103,7 +103,7 @@ private:
     bool _mayWrite = true;
     mutable std::mutex _mutex;
     std::mutex _writing;
-    std::map<std::string, std::string> _values; // base64, as the file has them
+    std::map<std::string, std::string> _values; // base64, as in the file
     bool _isDirty = false, _writeWaits = false;
 };
 

@@ -16,9 +16,9 @@ class Queue;
 
 namespace host::system {
 
-/// User defaults in one JSON file. It is read once; changes are written atomically on a queue, several at
-/// once as one write, and those that still wait when the object ends are written then. A file that is there
-/// but cannot be read, or that a newer version wrote, is left as it is.
+/// Keeps user defaults in one JSON file. The file is read once. Changes are written atomically on a queue,
+/// several at once as one write; those that still wait are written by the destructor. A file that exists but
+/// cannot be read, or that a newer version wrote, is left as it is.
 class JsonUserDefaults : public platform::UserDefaults {
 public:
     JsonUserDefaults(std::string path, platform::Dispatch& dispatch);

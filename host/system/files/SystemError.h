@@ -11,43 +11,43 @@
 
 namespace host::system {
 
-/// Why the system refused something: its errno and what the call was about. An operation that has nothing
-/// else to answer answers one of these, which is empty when nothing failed; the compiler does not let a
-/// caller overlook it. systemError() turns it into the platform's Error, which names what the user asked for;
-/// the name in here may lie far below that, and is for the log.
+/// The reason why a system call failed: its errno, and the name that the call was about. An operation without
+/// a value answers one of these, which is empty when nothing failed; the compiler does not let a caller
+/// ignore it. systemError() turns it into the platform's Error, which names the item that the user asked for.
+/// The name in here may lie far below that item, and is for the log.
 class [[nodiscard]] SystemError {
 public:
-    /// Nothing failed.
+    /// Makes the value that means that nothing failed.
     SystemError() = default;
     explicit SystemError(int number)
         : _number(number)
     {
     }
-    /// `about` is a name or a path as the call had it, as bytes.
+    /// `about` is a name or a path as the call got it, as bytes.
     SystemError(int number, std::string_view about)
         : _number(number)
         , _about(about)
     {
     }
-    /// The call that was made last failed: errno is taken before anything else can change it. `about` has to
-    /// lie at hand for the same reason.
+    /// Answers the error of the last system call. errno is read at once, before anything can change it; for
+    /// the same reason `about` must be a text that already exists.
     static SystemError last(std::string_view about = {})
     {
         const int number = errno;
         return SystemError(number, about);
     }
-    /// Nothing when the last call succeeded, else last().
+    /// Answers an empty error when the last call succeeded, else last().
     static SystemError unless(bool succeeded, std::string_view about = {})
     {
         return succeeded ? SystemError() : last(about);
     }
 
-    /// Whether something failed.
+    /// Answers whether something failed.
     explicit operator bool() const { return _number != 0; }
     bool is(int number) const { return _number == number; }
-    /// The errno; 0 when nothing failed.
+    /// Answers the errno, or 0 when nothing failed.
     int number() const { return _number; }
-    /// What the call was about; empty when that is what the caller named.
+    /// Answers the name that the call was about; empty when that is the item that the caller named.
     const std::string& about() const { return _about; }
 
 private:
@@ -55,8 +55,8 @@ private:
     std::string _about;
 };
 
-/// What an operation answers that has a value to give or was refused: exactly one of the two. It has the
-/// shape of platform::Result.
+/// The result of an operation that answers a value: exactly one of value and error is set. It has the shape
+/// of platform::Result.
 template <typename T>
 struct [[nodiscard]] SystemResult {
     std::optional<T> value;
@@ -71,9 +71,9 @@ struct [[nodiscard]] SystemResult {
     {
     }
 
-    /// Whether there is a value.
+    /// Answers whether there is a value.
     explicit operator bool() const { return value.has_value(); }
-    /// The value. Calling these without one is a programming error.
+    /// Answer the value. Calling these without one is a programming error.
     const T& operator*() const { return *value; }
     T& operator*() { return *value; }
     const T* operator->() const { return &*value; }
@@ -82,8 +82,8 @@ struct [[nodiscard]] SystemResult {
 
 } // namespace host::system
 
-/// Ends the function with the failure of an expression that answers a SystemError; goes on where it answers
-/// none. The function may answer a SystemError or a SystemResult.
+/// Ends the function with the error when an expression answers a SystemError that is not empty, and goes on
+/// otherwise. The function may answer a SystemError or a SystemResult.
 #define TRW_TRY(expression)                                                                                  \
     do {                                                                                                     \
         if (auto trwFailure = (expression))                                                                  \

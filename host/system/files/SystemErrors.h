@@ -12,10 +12,10 @@
 
 namespace host::system {
 
-/// The error for a system call that failed with `errorNumber` on a path: ENOENT is NoSuchItem, EEXIST is
-/// ItemExists, ENAMETOOLONG and EILSEQ are InvalidName, all in errorDomain::file; anything else is
-/// errorDomain::system with the number as its code. The user information holds the path, the destination of a
-/// move when there is one, and a sentence for the user that names the item.
+/// Answers the error for a system call that failed with `errorNumber` on a path. ENOENT is NoSuchItem, EEXIST
+/// is ItemExists, ENAMETOOLONG and EILSEQ are InvalidName, all in errorDomain::file; any other number is a
+/// code of errorDomain::system. The user information contains the path, the destination of a move when there
+/// is one, and a sentence for the user that names the item.
 platform::Error systemError(
     int errorNumber, std::string_view path, const std::optional<std::string>& destination = std::nullopt);
 inline platform::Error systemError(const SystemError& failure, std::string_view path,
@@ -24,10 +24,11 @@ inline platform::Error systemError(const SystemError& failure, std::string_view 
     return systemError(failure.number(), path, destination);
 }
 
-/// A failure as a log line has it: the name of its errno and what it was about.
+/// Answers an error as a text for the log: the name of its errno and the name that it is about.
 std::string logText(const SystemError& failure);
 
-/// The last name of a path as text for people: bytes that are no UTF-8 become replacement characters.
+/// Answers the last name of a path as text for people. Bytes that are not UTF-8 become replacement
+/// characters.
 std::string displayName(std::string_view path);
 
 } // namespace host::system
