@@ -13,7 +13,7 @@ using platform::FolderEntryKind;
 
 namespace {
 
-/// What follows the last dot, by the same rules as Url::pathExtension().
+/// Answers the part behind the last dot, by the same rules as Url::pathExtension().
 std::string_view extensionOf(std::string_view name)
 {
     const auto dot = name.rfind('.');
@@ -44,7 +44,7 @@ std::optional<FolderEntry> EntryClassifier::classify(std::string_view name, File
             return std::nullopt;
         const auto promised = name.substr(1, name.size() - 1 - promiseSuffix.size());
         if (promised.starts_with('.'))
-            return std::nullopt; // the promise of a hidden item
+            return std::nullopt; // it is the promise of a hidden item
         const bool isPackage = kindOfFolder(promised) == FolderEntryKind::Package;
         return FolderEntry{promised, isPackage ? FolderEntryKind::Package : kindOfFile(promised), true};
     }

@@ -13,7 +13,7 @@
 
 namespace host::system {
 
-/// Tells from a name and the file system's type alone what a folder's list shows for it. Any thread.
+/// Decides from a name and the file system's type alone what a folder's list shows for it. Any thread.
 class EntryClassifier {
 public:
     explicit EntryClassifier(std::shared_ptr<const MimeTypeRegistry> types)
@@ -21,8 +21,8 @@ public:
     {
     }
 
-    /// What the list shows, the entry's name being the logical one and a part of `name`; nothing for what is
-    /// hidden. A promise shows as a document, or as a package when its name says so.
+    /// Answers the entry that the list shows, whose name is the logical one and a part of `name`, or nothing
+    /// for a hidden item. A promise is shown as a document, or as a package when its name says so.
     std::optional<platform::FolderEntry> classify(std::string_view name, platform::FileType type) const;
 
 private:

@@ -11,12 +11,12 @@
 
 namespace host::system {
 
-/// Whether a name can stand for anything that a folder's list shows, so that a notice of it matters.
+/// Answers whether a name can stand for an item that a folder's list shows, so that a notice of it matters.
 bool mayBeListed(std::string_view name);
 
-/// Makes a folder's next list of the one before by looking again at some names alone: at what they stand for,
-/// be it here or promised. Costs a few system calls for each name, its place among the others, and one quick
-/// pass over the list before. Answers the list before when the names say nothing new. Any thread.
+/// Makes a folder's next list from the previous one by looking only at the items of some names, here or
+/// promised. It costs a few system calls and a binary search for each name, and one quick pass over the
+/// previous list. Answers the previous list when nothing has changed. Any thread.
 std::shared_ptr<const platform::FolderSnapshot> revisedList(const ListingTools& tools,
     platform::FolderGrouping grouping, const FileDescriptor& folder,
     const std::shared_ptr<const platform::FolderSnapshot>& before, std::span<const std::string> names);

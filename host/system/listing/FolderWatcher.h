@@ -13,23 +13,24 @@
 
 namespace host::system {
 
-/// Tells what changes directly in one folder: names that came or went, were written, or have other
-/// attributes, or that the folder itself went away.
+/// Reports changes directly in one folder: names that were created or removed, were written or have other
+/// attributes, and the disappearance of the folder itself.
 class FolderWatcher {
 public:
-    /// Called on the main thread (in GLib's default main context), once for all changes that one turn of the
-    /// loop brings: with the names, perhaps several times each. An empty name: changes were lost, or the
-    /// folder itself went away. It may end the watcher.
+    /// Called on the main thread (in GLib's default main context) with the names, perhaps several times each,
+    /// once for all changes that one turn of the loop brings. An empty name means that changes were lost or
+    /// that the folder itself disappeared. The handler may destroy the watcher.
     using Handler = std::function<void(const std::vector<std::string>& names)>;
 
-    /// `written` is called, in the same way, with the names of files whose content changes while they are
-    /// open, perhaps without end; without it they are told of when they are closed.
+    /// `written` is called in the same way with the names of files whose content changes while they are open,
+    /// perhaps without end. Without it such files are reported when they are closed.
     explicit FolderWatcher(Handler changed, Handler written = {});
     FolderWatcher(const FolderWatcher&) = delete;
     FolderWatcher& operator=(const FolderWatcher&) = delete;
 
-    /// Watches a folder instead of what was watched before; by descriptor it is the very folder that is open.
-    /// Any thread. Answers whether it is watched: it may be missing, or the system may have no watches left.
+    /// Watches a folder instead of the previous one. A descriptor means the very folder that is open. Any
+    /// thread. Answers whether the folder is watched, because it may be missing and the system may have no
+    /// watches left.
     bool watch(const std::string& folder);
     bool watch(const FileDescriptor& folder);
 

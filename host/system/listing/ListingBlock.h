@@ -16,32 +16,33 @@ namespace host::system {
 
 class NameOrder;
 
-/// A part of a folder's entries: gathered by one thread, then sorted by itself, then merged with the others.
+/// A part of a folder's entries. One thread gathers them, then the block is sorted by itself and merged with
+/// the others.
 class ListingBlock {
 public:
-    /// Packs an entry; the name is copied. `extra` is the index of the extra item behind it, or -1.
+    /// Packs an entry and copies its name. `extra` is the index of its extra item, or -1.
     void append(const platform::FolderEntry& entry, std::int32_t extra = -1);
     std::size_t count() const { return _entries.size(); }
     std::size_t nameBytes() const { return _names.size(); }
 
-    /// Appends what entries of a list are compared by, before their names as bytes.
+    /// Appends the key by which entries of a list are compared before their names as bytes.
     static void appendKey(const platform::FolderEntry& entry, const NameOrder& order,
         platform::FolderGrouping grouping, std::vector<std::uint8_t>& keys);
-    /// Sorts the block. Entries keep their numbers; rank() tells their places.
+    /// Sorts the block. Entries keep their numbers, and numberAt() answers them by place.
     void sort(const NameOrder& order, platform::FolderGrouping grouping);
 
-    /// The entry at a number; the name lives as long as the block, once nothing more is appended.
+    /// Answers the entry at a number. Its name lives as long as the block, once nothing more is appended.
     platform::FolderEntry entry(std::size_t number) const;
     std::int32_t extra(std::size_t number) const { return _entries[number].extra; }
 
-    /// The number of the entry at a place of the sorted block.
+    /// Answers the number of the entry at a place of the sorted block.
     std::size_t numberAt(std::size_t place) const { return _ranks[place].number; }
-    /// Whether the entry at a place comes before the one at a place of another block.
+    /// Answers whether the entry at a place comes before the one at a place of another block.
     bool isBefore(std::size_t place, const ListingBlock& other, std::size_t otherPlace) const
     {
         return compare(_ranks[place], other, other._ranks[otherPlace]) < 0;
     }
-    /// Whether an entry of a list, by its key, comes before the one at a place.
+    /// Answers whether an entry of a list, by its key, comes before the one at a place.
     bool isAfter(
         const platform::FolderEntry& other, std::span<const std::uint8_t> key, std::size_t place) const;
 
@@ -53,7 +54,7 @@ private:
         bool isPromise;
         std::int32_t extra;
     };
-    /// Enough of an entry's sort key to tell nearly all of them apart without looking the key up.
+    /// Enough bytes of an entry's sort key to compare nearly all entries without the key itself.
     struct Rank {
         std::uint64_t high, low;
         std::uint32_t number;

@@ -13,14 +13,14 @@ namespace host::system {
 
 namespace {
 
-// A name has at most 255 bytes on disk, and a library's shown name is cut here for sorting only.
+// A name has at most 255 bytes on disk. A library's name may be longer and is cut here for sorting only.
 constexpr std::size_t maximumUnits = 512;
 // Keys of usual names are much shorter.
 constexpr std::size_t usualKey = 512;
 
 using Units = std::array<UChar, maximumUnits>;
 
-/// The name as UTF-16; answers its length.
+/// Converts the name to UTF-16 and answers its length.
 std::int32_t widen(std::string_view name, Units& units)
 {
     name = name.substr(0, maximumUnits);
@@ -51,7 +51,7 @@ NameOrder::NameOrder(const std::string& locale)
     if (!_data->collator)
         return;
     _data->collator->setAttribute(UCOL_NUMERIC_COLLATION, UCOL_ON, status);
-    // Blanks and punctuation count, or "a b" and "ab" would change places at random.
+    // Blanks and punctuation count, because otherwise "a b" and "ab" would be equal and their order random.
     _data->collator->setAttribute(UCOL_ALTERNATE_HANDLING, UCOL_NON_IGNORABLE, status);
 }
 

@@ -11,16 +11,16 @@
 
 namespace host::system {
 
-/// The natural order of names in a language: letters as its dictionaries have them, case and accents only to
-/// break ties, "file 2" before "file 10". Any thread.
+/// The natural order of names in a language: letters as in its dictionaries, case and accents only to break
+/// ties, "file 2" before "file 10". Any thread.
 class NameOrder {
 public:
-    /// `locale` as ICU names it.
+    /// `locale` is ICU's name of a locale.
     explicit NameOrder(const std::string& locale);
     NameOrder(NameOrder&&) noexcept;
     ~NameOrder();
 
-    /// Appends the name's sort key, bytes to be compared as such. Bytes that are no UTF-8 sort like the
+    /// Appends the name's sort key, whose bytes are to be compared. Bytes that are not UTF-8 sort like the
     /// replacement character.
     void appendKey(std::string_view name, std::vector<std::uint8_t>& keys) const;
 

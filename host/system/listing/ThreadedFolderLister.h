@@ -17,12 +17,12 @@ namespace host::system {
 class MimeTypeRegistry;
 struct ListingTools;
 
-/// Lists folders by reading their names alone, on all cores, and watches them afterwards. What is told of a
-/// name leads to a look at that name alone; a folder that changes without end is followed in steps, which
+/// Lists folders by reading only their names, on all cores, and watches them afterwards. A notice about a
+/// name leads to a look at that name alone. A folder that changes without end is followed in steps, which
 /// take a fifth of the time at most.
 class ThreadedFolderLister : public platform::FolderLister {
 public:
-    /// `locale` chooses the order of names, as ICU names it.
+    /// `locale` is ICU's name of a locale, which decides the order of names.
     ThreadedFolderLister(std::shared_ptr<platform::Dispatch> dispatch,
         std::shared_ptr<const MimeTypeRegistry> types, const std::string& locale);
     ~ThreadedFolderLister() override;

@@ -16,9 +16,10 @@
 
 namespace host::system {
 
-/// Keeps one folder's list up to date: reads it whole once, and then looks again at the names that the kernel
-/// tells of. What is lost, or too much at once, is read whole again. One work at a time; the pauses between
-/// them grow with what they take. Main thread, but for what the works report.
+/// Keeps one folder's list up to date. It reads the whole folder once and then looks only at the names that
+/// the kernel reports. When notices were lost or are too many, it reads the whole folder again. Only one
+/// piece of work runs at a time, and the pauses between them grow with their duration. Main thread, except
+/// for the results of the work.
 class WatchedListing : public platform::FolderListing, public std::enable_shared_from_this<WatchedListing> {
 public:
     WatchedListing(std::shared_ptr<platform::Dispatch> dispatch, std::shared_ptr<const ListingTools> tools,
@@ -29,7 +30,8 @@ public:
 
 private:
     class Inbox;
-    /// Which folder was read, lest a list be continued with what another one at its place holds.
+    /// Identifies the folder that was read, so that a list is not continued with the content of another
+    /// folder in the same place.
     struct Identity {
         std::uint64_t device = 0, inode = 0;
         bool operator==(const Identity&) const = default;
@@ -58,11 +60,12 @@ private:
     std::shared_ptr<FolderWatcher> _watcher;
     std::shared_ptr<Inbox> _inbox;
     std::shared_ptr<FolderReading> _reading; ///< null while none is under way
-    Snapshot _latest; ///< what revisions go on from; null: only a reading can help
-    std::unordered_set<std::string> _names; ///< that were told of and not looked at since
-    std::unordered_set<std::string> _written; ///< that are being written, and looked at now and then
+    Snapshot _latest; ///< the list on which revisions build; null: the folder must be read
+    std::unordered_set<std::string> _names; ///< names that were reported and not looked at since
+    std::unordered_set<std::string>
+        _written; ///< names of files that are being written, which are looked at now and then
     platform::Date _workBegan;
-    std::uint64_t _rest = 0; ///< numbers the rests, of which only the last counts
+    std::uint64_t _rest = 0; ///< number of the pauses; only the last one counts
     bool _isRevising = false, _mustRead = false, _mustSettle = false, _isResting = false;
 };
 
