@@ -24,7 +24,7 @@ using platform::Work;
 
 namespace {
 
-// Work on serial queues may wait for the disk; a few stuck ones must not hold up the rest.
+// Work on serial queues may wait for the disk, and a few blocked queues must not hold up the others.
 constexpr std::size_t serialThreads = 16;
 
 std::size_t threadsFor(QualityOfService quality)
@@ -33,8 +33,8 @@ std::size_t threadsFor(QualityOfService quality)
     return quality == QualityOfService::UserInitiated ? 2 * cores : cores;
 }
 
-/// A timer's state. The scheduler holds it weakly and a call that waits in the queue strongly, so that ending
-/// the timer lets its handler go.
+/// A timer's state. The scheduler refers to it weakly and a call that waits in the queue strongly, so that
+/// destroying the timer destroys its handler.
 class TimerState : public std::enable_shared_from_this<TimerState> {
 public:
     TimerState(std::weak_ptr<Scheduler> scheduler, std::shared_ptr<Queue> queue, Duration period,
@@ -58,7 +58,7 @@ private:
     void scheduleNext()
     {
         _due += std::chrono::duration_cast<Scheduler::Clock::duration>(_period);
-        // After the machine slept or the thread was held up, missed calls are left out.
+        // Calls that were missed while the machine slept or the thread was held up are left out.
         _due = std::max(_due, Scheduler::Clock::now());
         if (const auto scheduler = _scheduler.lock())
             scheduler->schedule(_due, _leeway, weakly(this, &TimerState::fire));

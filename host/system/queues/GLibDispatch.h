@@ -15,9 +15,9 @@ namespace host::system {
 class Scheduler;
 class WorkerPool;
 
-/// Queues on GLib's default main context and on bounded pools of threads, one pool for each quality of
-/// service and one for the serial queues. Make it on the main thread, and let it end there, after everything
-/// that uses it: what has not begun by then never runs, what has is waited for.
+/// Queues on GLib's default main context and on bounded pools of threads: one pool for each quality of
+/// service and one for the serial queues. Make and destroy it on the main thread, and destroy it after
+/// everything that uses it. Work that has not begun by then never runs, and work that has is waited for.
 class GLibDispatch : public platform::Dispatch {
 public:
     GLibDispatch();
@@ -33,14 +33,14 @@ public:
     std::unique_ptr<platform::Timer> startTimer(const std::shared_ptr<platform::Queue>& queue,
         platform::Duration period, platform::Duration leeway, platform::Work handler) override;
     platform::Date now() const override;
-    /// For programs without a window: runs what the main queue has until there is no more to wait for, which
-    /// is asked after each piece of work. Called on the main thread.
+    /// Serves programs without a window: runs the main queue until `isOver`, which is asked after each piece
+    /// of work, answers true. Called on the main thread.
     void runMainQueueUntil(const std::function<bool()>& isOver);
 
 private:
     std::shared_ptr<MainQueue> _mainQueue;
     std::shared_ptr<WorkerPool> _serialPool;
-    std::array<std::shared_ptr<WorkerPool>, 4> _operationPools; // by QualityOfService
+    std::array<std::shared_ptr<WorkerPool>, 4> _operationPools; // indexed by QualityOfService
     std::shared_ptr<Scheduler> _scheduler;
 };
 

@@ -18,7 +18,7 @@ struct MainQueue::State {
     GSource* source = nullptr;
 };
 
-/// GLib's view of the queue: ready while work waits.
+/// The queue as a GLib source, which is ready while work waits.
 struct MainQueue::Source {
     GSource base;
     std::weak_ptr<State> state;
@@ -61,7 +61,8 @@ struct MainQueue::Source {
     {
         const auto weak = reinterpret_cast<Source*>(source)->state;
         const auto state = weak.lock();
-        // Only what waits now: work that adds work must not keep the loop from its other sources.
+        // Only the work that waits now is run, because work that adds work must not keep the loop from its
+        // other sources.
         auto count = state ? waiting(state) : 0;
         for (; count > 0; --count) {
             if (const auto work = takeFirst(weak))
@@ -80,8 +81,8 @@ MainQueue::MainQueue()
         Source::prepare, Source::check, Source::dispatch, Source::finalize, nullptr, nullptr};
     _state->source = g_source_new(&functions, sizeof(Source));
     std::construct_at(&reinterpret_cast<Source*>(_state->source)->state, _state);
-    // The priority of the toolkit's drawing: a stream of work then takes turns with frames and does not
-    // starve them, and input comes before both.
+    // The source has the priority of the toolkit's drawing. A stream of work then takes turns with frames
+    // instead of starving them, and input comes before both.
     g_source_set_priority(_state->source, G_PRIORITY_HIGH_IDLE + 20);
     g_source_set_can_recurse(_state->source, TRUE); // a nested loop still runs the queue
     g_source_set_static_name(_state->source, "main queue");

@@ -10,11 +10,11 @@
 
 namespace host::system {
 
-/// The queue of the thread that makes it: its work runs when that thread iterates GLib's default main
+/// The queue of the thread that makes it. Its work runs when that thread iterates GLib's default main
 /// context. Work that has not run when the queue is destroyed never runs.
 ///
-/// The work has the priority of the toolkit's drawing, so a flood of it takes turns with frames, and input
-/// comes before both. A turn runs only what waited when it began.
+/// The work has the priority of the toolkit's drawing, so that much work takes turns with frames, and input
+/// comes before both. A turn runs only the work that was waiting when it began.
 class MainQueue : public platform::Queue {
 public:
     MainQueue();

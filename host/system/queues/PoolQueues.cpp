@@ -39,8 +39,8 @@ private:
             pool->submit([weak = weak_from_this()] { runTurn(weak); });
     }
 
-    /// Runs one piece of work and lines up for the next, so that the queues of a pool take turns. Nothing
-    /// here keeps the queue alive while its work runs.
+    /// Runs one piece of work and lines up for the next, so that the queues of a pool take turns. The queue
+    /// may be destroyed while its work runs.
     static void runTurn(const std::weak_ptr<PendingWork>& weak)
     {
         Work work;

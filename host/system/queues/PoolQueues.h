@@ -11,7 +11,7 @@
 
 namespace host::system {
 
-/// Work that waits for its turn on a pool. When it is destroyed, what has not begun never runs.
+/// Work that waits for its turn on a pool. When it is destroyed, work that has not begun never runs.
 class PendingWork;
 
 /// A queue that runs on whichever thread of a pool is free, one piece of work at a time.

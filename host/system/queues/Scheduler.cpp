@@ -91,7 +91,7 @@ void Scheduler::run(const std::shared_ptr<State>& state)
             lock.unlock();
             for (const auto& handler : due)
                 handler();
-            due.clear(); // what the handlers captured ends here, outside the lock
+            due.clear(); // the captured objects are destroyed here, outside the lock
             lock.lock();
         }
     }

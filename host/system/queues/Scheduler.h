@@ -11,19 +11,19 @@
 
 namespace host::system {
 
-/// One thread that calls brief handlers when their time has come. The clock is monotonic. Any thread may
-/// schedule.
+/// One thread that calls brief handlers at their times. The clock is monotonic. Any thread may schedule.
 class Scheduler {
 public:
     using Clock = std::chrono::steady_clock;
 
     Scheduler();
-    /// Drops what is not due yet and waits for a handler that runs, unless it runs on this thread.
+    /// Drops handlers that are not due yet and waits for one that runs, unless it runs on this thread.
     ~Scheduler();
     Scheduler(const Scheduler&) = delete;
     Scheduler& operator=(const Scheduler&) = delete;
 
-    /// Calls once, at `due` or up to `leeway` later: handlers whose spans overlap share one waking.
+    /// Calls the handler once, at `due` or up to `leeway` later, so that handlers whose spans overlap share
+    /// one wake-up.
     void schedule(Clock::time_point due, platform::Duration leeway, platform::Work handler);
 
 private:

@@ -57,7 +57,7 @@ void runWorker(const auto& state)
         state->pending.pop_front();
         lock.unlock();
         work();
-        work = nullptr; // what it captured ends here, outside the lock
+        work = nullptr; // the captured objects are destroyed here, outside the lock
         lock.lock();
     }
 }

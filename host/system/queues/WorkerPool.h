@@ -10,15 +10,15 @@
 
 namespace host::system {
 
-/// A bounded number of threads that run work in the order in which it was submitted. Threads start when there
-/// is work for them and stay. Any thread may submit.
+/// A bounded number of threads that run work in the order of its submission. Threads start when there is work
+/// for them and stay. Any thread may submit.
 class WorkerPool {
 public:
-    /// `quality` chooses how the kernel schedules the threads: Utility gives way to the interface, Background
-    /// to everything, on the disk too.
+    /// `quality` decides how the kernel schedules the threads: Utility yields to the interface, Background to
+    /// everything, also on the disk.
     WorkerPool(platform::QualityOfService quality, std::size_t maximumThreads);
-    /// Drops what has not begun and waits for what has; the thread that calls is not waited for when it is
-    /// one of the pool's own.
+    /// Drops work that has not begun and waits for work that has. When the calling thread is one of the
+    /// pool's own, it is not waited for.
     ~WorkerPool();
     WorkerPool(const WorkerPool&) = delete;
     WorkerPool& operator=(const WorkerPool&) = delete;
