@@ -34,7 +34,7 @@ std::vector<std::string> pathsOf(const std::vector<Url>& folders)
 
 } // namespace
 
-/// What all searches share: the index of the last one, and the queues.
+/// The state that all searches share: the index of the last search, and the queues.
 class IndexedNameSearch::Store : public std::enable_shared_from_this<Store> {
 public:
     Store(std::shared_ptr<platform::Dispatch> usedDispatch, std::shared_ptr<const MimeTypeRegistry> types)
@@ -45,7 +45,7 @@ public:
     {
     }
 
-    /// The index of just these roots, when it is kept.
+    /// Answers the index of exactly these roots, or null when it is not kept.
     Index indexOf(const std::vector<std::string>& roots)
     {
         const std::lock_guard lock(_mutex);
@@ -124,7 +124,7 @@ private:
         return _index;
     }
 
-    /// Reads the names without keeping the session alive, so that its end ends the reading.
+    /// Reads the names without keeping the session alive, so that destroying the session ends the reading.
     static void refresh(
         const Weak& weak, Store& store, const std::vector<std::string>& roots, const Index& earlier)
     {
@@ -204,9 +204,9 @@ private:
     const std::shared_ptr<Store> _store;
     const std::vector<std::string> _roots;
     const Update _update;
-    std::atomic<unsigned> _generation = 0; ///< of the query
+    std::atomic<unsigned> _generation = 0; ///< number of the query
     std::atomic<bool> _findIsWaiting = false;
-    std::mutex _mutex; ///< guards what follows
+    std::mutex _mutex; ///< guards the fields below
     Index _index; ///< null until names are known
     std::string _query;
     bool _isComplete = false;

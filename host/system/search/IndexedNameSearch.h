@@ -12,9 +12,9 @@ namespace host::system {
 
 class MimeTypeRegistry;
 
-/// Searches a packed index of names (see NameIndex), which is read when the first search begins, brought up
-/// to date every two seconds while one goes on, and dropped a minute after the last one. To bring it up to
-/// date takes a look at each folder, and a reading of those that were modified.
+/// Searches a packed index of names (see NameIndex). The index is read when the first search begins, brought
+/// up to date every two seconds during a search, and dropped a minute after the last search. Bringing it up
+/// to date takes one look at each folder and a reading of the modified ones.
 class IndexedNameSearch : public platform::NameSearch {
 public:
     IndexedNameSearch(

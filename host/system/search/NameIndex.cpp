@@ -27,7 +27,7 @@ std::vector<std::string_view> wordsOf(std::string_view text)
             words.push_back(text.substr(0, end));
         text.remove_prefix(std::min(end + 1, text.size()));
     }
-    // The longest one is looked for first: it is found least often.
+    // The longest word is searched for first, because it occurs least often.
     std::ranges::stable_sort(words, std::ranges::greater(), &std::string_view::size);
     return words;
 }
@@ -37,7 +37,8 @@ bool isWordCharacter(char c)
     return (c >= 'a' && c <= 'z') || (c >= '0' && c <= '9') || static_cast<unsigned char>(c) >= 0x80;
 }
 
-/// 0: the name begins with the text; 1: a word of it does; 2: it stands elsewhere, or in parts.
+/// Answers 0 when the name begins with the text, 1 when a word of it does, and 2 when the text is elsewhere
+/// or in parts.
 std::size_t rankOf(std::string_view folded, std::string_view query)
 {
     const auto place = folded.find(query);
@@ -67,7 +68,7 @@ NameIndex::Item NameIndex::item(std::size_t number) const
 platform::FoundItem NameIndex::found(std::size_t number) const
 {
     const auto after = std::ranges::upper_bound(_folders, number, {}, &Folder::firstItem);
-    // Empty folders share their first item's number with the folder behind them.
+    // Empty folders have the same first item as the folder behind them.
     const auto& folder = *std::find_if(std::make_reverse_iterator(after), _folders.rend(),
         [number](const Folder& each) { return number < each.firstItem + each.itemCount; });
     const auto found = item(number);
@@ -90,7 +91,7 @@ std::size_t NameIndex::bytes() const
 
 std::size_t NameIndex::itemAt(std::size_t foldedOffset, std::size_t from) const
 {
-    // Hits are near one another or far apart: steps that double find both soon.
+    // Hits are close together or far apart, and steps that double find both quickly.
     std::size_t step = 1, low = from;
     while (low + step < _foldedEnds.size() && _foldedEnds[low + step] <= foldedOffset) {
         low += step;

@@ -15,16 +15,17 @@
 
 namespace host::system {
 
-/// The names of all items below some folders, packed for a search: per item its name twice (as it is, and
-/// folded) and 11 bytes. Immutable; any thread.
+/// The names of all items below some folders, packed for a search. Each item takes its name twice (as it is,
+/// and folded) and 11 bytes. Immutable; any thread.
 class NameIndex {
 public:
     class Builder;
 
-    /// A folder and the items directly in it, which stand together.
+    /// A folder and the items directly in it, which follow one another.
     struct Folder {
         std::string path;
-        std::int64_t modified = 0; ///< nanoseconds since 1970; 0: it may have changed since it was read
+        std::int64_t modified =
+            0; ///< nanoseconds since 1970; 0: the folder may have changed since it was read
         std::uint32_t firstItem = 0, itemCount = 0;
     };
     struct Item {
@@ -32,7 +33,7 @@ public:
         platform::FolderEntryKind kind;
         bool isPromise;
     };
-    /// Items by number, the best ones first.
+    /// The numbers of items, the best ones first.
     struct Found {
         std::vector<std::uint32_t> items;
         std::size_t total = 0;
@@ -43,10 +44,11 @@ public:
     Item item(std::size_t number) const;
     platform::FoundItem found(std::size_t number) const;
     std::size_t bytes() const; ///< of memory
-    /// What a scan reads: the folded names, each behind a zero byte.
+    /// Answers the text that a scan reads: the folded names, each behind a zero byte.
     std::string_view foldedNames() const { return _folded; }
 
-    /// The items whose names hold every word of a folded text. `isCancelled` is asked now and then.
+    /// Answers the items whose names contain every word of a folded text. `isCancelled` is asked every few
+    /// thousand hits.
     Found find(
         std::string_view foldedQuery, std::size_t limit, const std::function<bool()>& isCancelled) const;
 
@@ -56,20 +58,20 @@ private:
     std::vector<Folder> _folders; ///< in the order of their items
     std::string _names, _folded;
     std::vector<std::uint32_t> _nameEnds, _foldedEnds; ///< of each item
-    std::vector<std::uint8_t> _marks; ///< kind, and whether it is a promise
+    std::vector<std::uint8_t> _marks; ///< kind and promise flag of each item
 };
 
-/// Gathers an index, folder after folder.
+/// Builds an index, folder after folder.
 class NameIndex::Builder {
 public:
     void beginFolder(std::string path, std::int64_t modified);
-    /// An item of the folder that was begun last. More than 4 GiB of names are not taken.
+    /// Adds an item to the folder that was begun last. Names beyond 4 GiB are left out.
     void append(const Item& item);
 
     std::size_t itemCount() const { return _index.itemCount(); }
-    /// Ends the gathering and gives back the memory that it took beyond what is needed.
+    /// Answers the index and releases the memory that it does not need.
     NameIndex finish();
-    /// What was gathered so far.
+    /// Answers the index so far.
     const NameIndex& soFar() const { return _index; }
 
 private:
