@@ -19,9 +19,9 @@ namespace host::system {
 
 namespace {
 
-/// The C library looks nothing up in the "C" locale, and falls back to it when the user's is not installed.
-/// "C.UTF-8" is always there and looks LANGUAGE up. It goes into the environment, for the toolkit sets the
-/// locale from there again.
+/// The C library looks up no texts in the "C" locale, and falls back to it when the user's locale is not
+/// installed. "C.UTF-8" always exists and obeys LANGUAGE. It is set in the environment, because the toolkit
+/// sets the locale from there again.
 void leaveTheCLocale()
 {
     const bool isInstalled = std::setlocale(LC_ALL, "") != nullptr;
@@ -34,7 +34,7 @@ void leaveTheCLocale()
     std::setlocale(LC_ALL, "");
 }
 
-/// The language of the catalogue in use, from its header.
+/// Answers the language of the catalogue in use, from its header.
 std::string catalogueLanguage()
 {
     const std::string_view header = dgettext(textDomain, "");
@@ -46,8 +46,8 @@ std::string catalogueLanguage()
     return std::string(value.substr(0, value.find('\n')));
 }
 
-/// gettext's rules know whole numbers only. A fraction reads as a plural in every language that we have, and
-/// so does a hundred.
+/// gettext's rules know whole numbers only. A fraction is answered as a hundred, because both are plurals in
+/// every language that we have.
 unsigned long pluralNumber(double number)
 {
     const auto size = std::fabs(number);
@@ -69,7 +69,7 @@ GettextLocalization::GettextLocalization(const std::string& folder, const UserLo
 
 std::string GettextLocalization::text(const std::string& key) const
 {
-    // The empty key is the catalogue's header.
+    // The empty key would answer the catalogue's header.
     return key.empty() ? key : dgettext(textDomain, key.c_str());
 }
 

@@ -11,12 +11,13 @@ namespace host::system {
 
 struct UserLocale;
 
-/// Texts from gettext's catalogues, domain "tarrow-drive". The choice of language is the whole process's, the
-/// toolkit's own texts included: make one object, in main, before other threads and before the toolkit.
+/// Texts from gettext's catalogues, domain "tarrow-drive". The choice of language is the whole process's,
+/// including the toolkit's own texts, so make one object, in main, before other threads and before the
+/// toolkit.
 class GettextLocalization : public platform::Localization {
 public:
-    /// `folder` holds LANGUAGE/LC_MESSAGES/tarrow-drive.mo. Catalogues work without the system's locale being
-    /// installed, and English ones in the "C" locale.
+    /// `folder` contains LANGUAGE/LC_MESSAGES/tarrow-drive.mo. Catalogues work even when the system's locale
+    /// is not installed, and English ones in the "C" locale.
     GettextLocalization(const std::string& folder, const UserLocale& locale);
 
     std::string text(const std::string& key) const override;

@@ -27,13 +27,13 @@ namespace {
 constexpr int unitCount = 6; // bytes, KB, MB, GB, TB, PB
 constexpr int styleCount = 5;
 
-/// Fraction digits that a unit shows at most.
+/// Answers the largest number of fraction digits that a unit shows.
 int fractionDigits(int unit)
 {
     return unit <= 1 ? 0 : unit == 2 ? 1 : 2;
 }
 
-/// An amount in the unit that suits it, rounded as it is shown.
+/// An amount in its best unit, rounded as it is shown.
 struct Amount {
     double number;
     int unit;
@@ -88,7 +88,7 @@ icu::DateFormat::EStyle icuStyle(DateStyle style)
     return styles[static_cast<std::size_t>(style)];
 }
 
-/// Locale data writes "kB" in many languages; files are counted in "KB".
+/// Replaces "kB", which the locale data has for many languages, by "KB".
 std::string withCapitalK(std::string text)
 {
     if (const auto unit = text.find("kB"); unit != std::string::npos)
@@ -104,7 +104,7 @@ struct IcuFormatters::Data {
     LocalizedNumberFormatter integer;
     std::array<LocalizedNumberFormatter, unitCount> withUnit, withoutUnit;
     std::unique_ptr<icu::Collator> collator;
-    // Made when first asked for: a format costs about a tenth of a millisecond to make.
+    // The formats are made at the first use, because each takes about a tenth of a millisecond.
     std::mutex datesMutex;
     std::array<std::unique_ptr<icu::DateFormat>, styleCount * styleCount> dates;
 
@@ -140,7 +140,7 @@ IcuFormatters::IcuFormatters(const std::string& locale, const std::string& timeZ
     }
     UErrorCode status = U_ZERO_ERROR;
     _data->collator.reset(icu::Collator::createInstance(_data->locale, status));
-    // Secondary strength tells accents apart and letter case not.
+    // Secondary strength distinguishes accents but not letter case.
     if (_data->collator)
         _data->collator->setStrength(icu::Collator::SECONDARY);
 }

@@ -10,11 +10,12 @@
 
 namespace host::system {
 
-/// Texts by the locale data of ICU. Byte counts use bytes, KB, MB, GB, TB and PB; an amount that rounds up to
-/// a full unit is shown in that unit, and none at all as "Zero KB" ("0" without its unit).
+/// Texts by ICU's locale data. Byte counts use bytes, KB, MB, GB, TB and PB. An amount that rounds up to a
+/// full unit is shown in that unit, and zero as "Zero KB" ("0" without its unit).
 class IcuFormatters : public platform::Formatters {
 public:
-    /// `locale` as ICU names it; `timeZone` as in "Europe/Vienna", empty for the system's.
+    /// `locale` is ICU's name of a locale. `timeZone` is a name such as "Europe/Vienna"; empty means the
+    /// system's.
     explicit IcuFormatters(const std::string& locale, const std::string& timeZone = {});
     ~IcuFormatters() override;
 

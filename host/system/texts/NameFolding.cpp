@@ -13,7 +13,7 @@
 namespace host::system {
 
 struct NameFolding::Data {
-    /// Owned by the library; null when its data is not installed.
+    /// The library owns these; they are null when its data is not installed.
     const icu::Normalizer2* caseFolding = nullptr;
     const icu::Normalizer2* decomposition = nullptr;
 };

@@ -9,15 +9,15 @@
 
 namespace host::system {
 
-/// Makes names comparable for a search: without case, accents and compatibility forms ("Café" as "cafe", "ﬁ"
-/// as "fi"). Any thread.
+/// Makes names comparable for a search: without case, accents and compatibility forms ("Café" becomes "cafe",
+/// "ﬁ" becomes "fi"). Any thread.
 class NameFolding {
 public:
     NameFolding();
     NameFolding(NameFolding&&) noexcept;
     ~NameFolding();
 
-    /// Appends the folded form of a name. Bytes that are no UTF-8 become the replacement character.
+    /// Appends the folded form of a name. Bytes that are not UTF-8 become the replacement character.
     void append(std::string_view name, std::string& folded) const;
 
 private:

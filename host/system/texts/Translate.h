@@ -10,10 +10,11 @@ namespace host::system {
 /// The name of the program's message catalogue.
 inline constexpr const char* textDomain = "tarrow-drive";
 
-/// A text of the host's own in the user's language; the key itself when the catalogue has none. Any thread.
+/// Answers a text of the host itself in the user's language, or the key when the catalogue has none. Any
+/// thread.
 std::string translated(const char* key);
 
-/// Marks a text of a table as one that is looked up later, for the check of the catalogues.
+/// Marks a text in a table that is looked up later, for the check of the catalogues.
 constexpr const char* textKey(const char* key)
 {
     return key;

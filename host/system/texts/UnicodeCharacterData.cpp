@@ -7,7 +7,7 @@
 
 namespace host::system {
 
-// Non-characters are in the category of unassigned code points too.
+// Non-characters are in the category of unassigned code points as well.
 bool UnicodeCharacterData::isIllegal(char32_t point) const
 {
     return u_charType(static_cast<UChar32>(point)) == U_UNASSIGNED;

@@ -11,7 +11,7 @@ namespace host::system {
 
 namespace {
 
-/// The first variable that is set and not empty.
+/// Answers the value of the first variable that is set and not empty.
 std::string firstOf(std::initializer_list<const char*> names)
 {
     for (const char* name : names) {
@@ -21,7 +21,8 @@ std::string firstOf(std::initializer_list<const char*> names)
     return {};
 }
 
-/// A locale's name without codeset ("de_AT.UTF-8" is "de_AT"); empty for the locales that are no language.
+/// Answers a locale's name without its codeset ("de_AT.UTF-8" becomes "de_AT"); empty for locales that are
+/// not a language.
 std::string plainName(const std::string& locale)
 {
     const auto name = locale.substr(0, locale.find_first_of(".@"));
@@ -34,7 +35,7 @@ UserLocale UserLocale::fromEnvironment()
 {
     const auto messages = plainName(firstOf({"LC_ALL", "LC_MESSAGES", "LANG"}));
     const auto formats = plainName(firstOf({"LC_ALL", "LC_TIME", "LC_COLLATE", "LANG"}));
-    // The C library ignores LANGUAGE in the C locale; so does everything else the user runs.
+    // The C library ignores LANGUAGE in the C locale, so this does as well.
     const auto wanted = messages.empty() ? std::string() : firstOf({"LANGUAGE"});
     UserLocale locale;
     locale.languages = !wanted.empty() ? wanted : messages.empty() ? "en" : messages;

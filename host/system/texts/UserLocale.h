@@ -10,16 +10,16 @@ namespace host::system {
 
 /// The user's languages and region.
 struct UserLocale {
-    /// Languages for texts, most wanted first, separated by colons ("de_AT:de:en").
+    /// The languages for texts, the preferred one first, separated by colons ("de_AT:de:en").
     std::string languages;
-    /// The locale of dates, numbers and sorting, as ICU names it ("de_AT").
+    /// The locale of dates, numbers and sorting, by ICU's name ("de_AT").
     std::string formats;
 
-    /// Reads LANGUAGE, LC_ALL, LC_MESSAGES, LC_TIME, LC_COLLATE and LANG as the C library does. Where nothing
-    /// or only the "C" locale is asked for, the answer is English.
+    /// Reads LANGUAGE, LC_ALL, LC_MESSAGES, LC_TIME, LC_COLLATE and LANG like the C library. When nothing or
+    /// only the "C" locale is asked for, the answer is English.
     static UserLocale fromEnvironment();
 
-    /// `languages`, each by itself.
+    /// Answers the parts of `languages`.
     std::vector<std::string> languageList() const;
 };
 
