@@ -21,7 +21,7 @@ public:
 
     const std::string& kind() const { return _kind; }
     const PropertyDictionary& settings() const { return _settings; }
-    void setSettings(PropertyDictionary settings); ///< the peer hears of it as a change of content
+    void setSettings(PropertyDictionary settings); ///< the peer is told of a change of content
 
     using EventHandler = std::function<void(const std::string& event, const PropertyValue& value)>;
     void setOnEvent(EventHandler handler) { _onEvent = std::move(handler); }

@@ -15,7 +15,7 @@
 namespace host::gtk {
 
 /// Shows a stack of screens as the pages of an AdwLeaflet. A page is built for the top screen and for the one
-/// below it, which a swipe can uncover. A swipe shows that page from its beginning; the model hears of it
+/// below it, which a swipe can uncover. A swipe shows that page from its beginning; the model is told of it
 /// when it has ended.
 ///
 /// Under X the leaflet's gestures wait for ever for the end of a touch that a list took over;

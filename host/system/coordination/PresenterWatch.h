@@ -41,7 +41,8 @@ public:
     /// Stops the watch. No presenter is told anything afterwards.
     void stop();
 
-    /// Around each write of this process, inside its locks. Its presenters hear of it otherwise.
+    /// Call these around each write of this process, inside its locks. The presenters are told of such a
+    /// write otherwise.
     void beginOwnWrite(std::span<const OwnWrite> writes);
     void endOwnWrite(std::span<const OwnWrite> writes);
     /// Says inside such a write that the item was moved.

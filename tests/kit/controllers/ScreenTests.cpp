@@ -380,7 +380,7 @@ public:
 
 } // namespace
 
-TEST_F(Screens, HearOfANewSizeBeforeItHolds)
+TEST_F(Screens, AreToldOfANewSizeBeforeItApplies)
 {
     const auto turning = std::make_shared<Turning>();
     navigation->setViewControllers({turning}, false);

@@ -228,7 +228,7 @@ TEST(Text, IsMeasuredInLinesOfWords)
     EXPECT_EQ(measurer.measure(styled, Font::preferred(TextStyle::Body, 5), {}), (Size{18, 12}));
 }
 
-TEST(KeyboardNotice, SurvivesTheTrip)
+TEST(KeyboardNotice, SurvivesTheWayThroughUserInformation)
 {
     const KeyboardNotice notice{{0, 640, 360, 250}, {0, 390, 360, 250}, 0.4, 2};
     EXPECT_EQ(KeyboardNotice::fromUserInfo(notice.toUserInfo()), notice);

@@ -134,7 +134,7 @@ protected:
     std::mt19937 _random{7};
 };
 
-TEST_P(LiveList, ComesToSayWhatAFreshReadingSays)
+TEST_P(LiveList, EndsInTheStateThatAFreshReadingGives)
 {
     drive.makeFolder("Stuff");
     for (int i = 0; i < 50; ++i)

@@ -165,7 +165,7 @@ TEST_F(DownloadTest, EndsForAllWhenItIsCancelledForTheDocument)
     EXPECT_TRUE(isIntact("a.txt", text));
 }
 
-TEST_F(DownloadTest, NothingIsHeardOfACancelledDownloadAndThePromiseStays)
+TEST_F(DownloadTest, ACancelledDownloadReportsNothingAndThePromiseStays)
 {
     const std::string text(3'000'000, 'x');
     const auto item = promise("a.txt", text);
@@ -249,7 +249,7 @@ TEST_F(DownloadTest, WhatHappensMeanwhileCounts)
     EXPECT_FALSE(hasTraces());
 }
 
-TEST_F(DownloadTest, WhatCannotBeFetchedIsTold)
+TEST_F(DownloadTest, FailuresToFetchAreReported)
 {
     PromiseRecord nowhere, folder, elsewhere;
     folder.kind = PromiseRecord::Kind::Directory;

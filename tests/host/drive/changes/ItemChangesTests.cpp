@@ -337,7 +337,7 @@ TEST_F(ItemChangesTest, WhatCannotBePutBackGoesToTheTrash)
     EXPECT_EQ(contentOf(layout().trash() + "/b.txt 2"), "old");
 }
 
-TEST_F(ItemChangesTest, AMountIsNeitherEnteredNorALeadIntoOneself)
+TEST_F(ItemChangesTest, AMountIsNotEnteredAndDoesNotHideAMoveOfAFolderIntoItself)
 {
     const auto outside = folder().write("outside/kept.txt", "precious");
     const auto tree = makeFolder("tree"), sub = makeFolder("tree/sub"), mounted = makeFolder("tree/mounted");

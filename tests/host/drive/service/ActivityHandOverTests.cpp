@@ -126,7 +126,7 @@ TEST_F(HandOver, offersToOtherDevicesWhatIsCurrentAndTakesItBack)
     EXPECT_EQ(changeCount, 3);
 }
 
-TEST_F(HandOver, offersNotWhatIsShownHereAlready)
+TEST_F(HandOver, offersNoDocumentThatIsShownHereAlready)
 {
     const auto other = makeDevice("other");
     const auto here = viewing(bookmark("Documents/a.txt"));

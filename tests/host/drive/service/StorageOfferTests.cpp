@@ -77,7 +77,7 @@ TEST_F(StorageOfferTests, isReadOnceAndThenFollowed)
     EXPECT_EQ(_notices, 3);
 }
 
-TEST_F(StorageOfferTests, nobodyAsksNobodyReads)
+TEST_F(StorageOfferTests, isNotReadBeforeItIsAskedFor)
 {
     writeOffer(_offer);
     _drive.settle();

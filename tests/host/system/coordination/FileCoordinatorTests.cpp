@@ -152,7 +152,7 @@ TEST_F(FileCoordinatorTest, twoWritersInOppositeOrderDoNotWaitForEachOther)
     EXPECT_EQ(most, 1);
 }
 
-TEST_F(FileCoordinatorTest, anAccessorMayCoordinateAgainForWhatItsThreadHas)
+TEST_F(FileCoordinatorTest, anAccessorMayCoordinateAgainForItemsThatItsThreadHolds)
 {
     LocalFileCoordinator coordinator(settings());
     const auto folder = Url::fileURL("/f"), item = Url::fileURL("/f/i");

@@ -125,7 +125,7 @@ TEST_F(TwoProcessTest, aHolderThatHangsIsNotWaitedForForever)
     EXPECT_FALSE(coordinator.coordinateWriting(item, WritingOptions::None, [](auto&) {}));
 }
 
-TEST_F(TwoProcessTest, ofTwoWhoMoveOneItemExactlyOneDoes)
+TEST_F(TwoProcessTest, ofTwoMovesOfOneItemExactlyOneSucceeds)
 {
     LocalFileCoordinator coordinator(settings());
     for (int round = 0; round < 100; ++round) {
@@ -278,7 +278,7 @@ TEST_F(TwoProcessTest, whatThisProcessWritesIsNotToldTwice)
     EXPECT_THAT(item->heard, ElementsAre("deletes"));
 }
 
-TEST_F(TwoProcessTest, whatOthersDoDuringAWriteIsToldAllTheSame)
+TEST_F(TwoProcessTest, changesByOthersDuringAWriteAreReported)
 {
     LocalFileCoordinator coordinator(settings());
     const auto item = present(coordinator, presentedFile);
@@ -293,7 +293,7 @@ TEST_F(TwoProcessTest, whatOthersDoDuringAWriteIsToldAllTheSame)
     EXPECT_THAT(folder->heard, ElementsAre("deletes b.txt", "changed", "deletes a.txt", "changed"));
 }
 
-TEST_F(TwoProcessTest, nobodyIsToldWhoHasLeft)
+TEST_F(TwoProcessTest, aRemovedPresenterIsToldNothing)
 {
     auto coordinator = std::make_unique<LocalFileCoordinator>(settings());
     const auto removed = present(*coordinator, presentedFile), kept = present(*coordinator, presentedFile);
@@ -338,7 +338,7 @@ private:
     const std::shared_ptr<platform::OperationQueue> _queue;
 };
 
-TEST_F(TwoProcessTest, everybodyIsHeardOnRealThreads)
+TEST_F(TwoProcessTest, noChangeIsMissedOnRealThreads)
 {
     constexpr int rounds = 50;
     const auto dispatch = std::make_shared<host::system::GLibDispatch>();
