@@ -41,11 +41,6 @@ std::string textOrEmpty(const AttributeMap& values, AttributeKey key)
     return text ? *text : std::string();
 }
 
-std::vector<std::string> tagNames(const Url& url)
-{
-    return promisedItems().tagNames(url).value.value_or(std::vector<std::string>());
-}
-
 bool isSharedByAnother(const AttributeMap& values)
 {
     const auto* role = values.get<platform::SharedItemRole>(AttributeKey::SharedItemRole);
@@ -111,7 +106,8 @@ bool DRItem::readValues(const Url& location)
     initFromKeysAndValuesWithURL(*values, location);
     _canPreview = _resolvedURL && services().previewSupport().canPreview(*_resolvedURL);
     if (_resolvedURL)
-        _tags = isResolvedURL(location) ? std::move(reading.tagNames) : tagNames(*_resolvedURL);
+        _tags = isResolvedURL(location) ? std::move(reading.tagNames)
+                                        : promisedItems().readItem(*_resolvedURL, {}).tagNames;
     return true;
 }
 

@@ -17,7 +17,7 @@ struct ItemReading {
     std::optional<Error> unreachable; ///< as PromisedItems::checkPromisedItemIsReachable()
     Result<AttributeMap> values; ///< as promisedItemResourceValues()
     Url physicalURL; ///< as physicalURLForPromise(); the item's own location when it is unreachable
-    std::vector<std::string> tagNames; ///< as tagNames(); empty when they could not be read
+    std::vector<std::string> tagNames; ///< in the user's order; empty also when they could not be read
 };
 
 /// Reads the items of the drive by their logical location, whether they are here or only promised.
@@ -39,9 +39,10 @@ public:
     /// when its promise is damaged; else the system's.
     virtual Result<AttributeMap> promisedItemResourceValues(const Url& url, AttributeKeys keys) const = 0;
 
-    /// Reads reachability, attributes, place and tags of an item with one look at the disk, which is quicker
-    /// than the four calls and gives answers that fit each other.
-    virtual ItemReading readItem(const Url& url, AttributeKeys keys) const;
+    /// Reads reachability, attributes, place and tags of an item with one look at the disk, so that the
+    /// answers fit each other. Rows are read by it, which is how the index of identifiers learns where an
+    /// item went that another program has moved. It gives no identifier to an item that has none.
+    virtual ItemReading readItem(const Url& url, AttributeKeys keys) const = 0;
 
     /// Reads attributes of what lies at a location in the file system itself; a promise is not looked for,
     /// and a link is not followed. Errors: as above.
@@ -67,10 +68,6 @@ public:
     /// Answers the target of an alias file, without asking the user and without mounting anything. Errors: as
     /// for a reference, and FileErrorCode::NoSuchItem when the target is not there.
     virtual Result<Url> resolveAliasFile(const Url& url) const = 0;
-
-    /// Answers the names of the item's tags, in the user's order; none when it has none. Errors: as for the
-    /// attributes.
-    virtual Result<std::vector<std::string>> tagNames(const Url& url) const = 0;
 };
 
 } // namespace platform

@@ -83,10 +83,10 @@ RowDetails readRowDetails(const Url& url, FolderEntryKind kind)
     details.isContainer = isContainer(kind);
     services().fileCoordinator().coordinateReading(
         url, ReadingOptions::ImmediatelyAvailableMetadataOnly, [&](const Url& location) {
-            if (const auto values = promisedItems().promisedItemResourceValues(location, detailKeys))
-                describe(details, location, kind, *values);
-            if (auto names = promisedItems().tagNames(location))
-                details.tagNames = std::move(*names.value);
+            auto reading = promisedItems().readItem(location, detailKeys);
+            if (reading.values)
+                describe(details, location, kind, *reading.values);
+            details.tagNames = std::move(reading.tagNames);
         });
     return details;
 }

@@ -234,7 +234,7 @@ TEST_F(FileChangesTest, MovesAPromiseAsAPromise)
     EXPECT_FALSE(isThere(to));
     EXPECT_EQ(
         FileUtils::getResourceValueForURL(AttributeKey::FileSize, to), AttributeValue(std::uint64_t{77}));
-    EXPECT_EQ(DriveFixture::cloud->promisedItems().tagNames(to).value, promise.tags);
+    EXPECT_EQ(DriveFixture::cloud->promisedItems().readItem(to, {}).tagNames, promise.tags);
 }
 
 TEST_F(FileChangesTest, AFolderSwappedForALinkLeadsNowhere)
@@ -389,8 +389,7 @@ TEST_F(FileChangesTest, EvictsADocumentAndKeepsWhatIsKnownOfIt)
     EXPECT_EQ(
         FileUtils::getResourceValueForURL(AttributeKey::FileSize, url), AttributeValue(std::uint64_t{5}));
     EXPECT_EQ(FileUtils::getResourceValueForURL(AttributeKey::ContentModificationDate, url), date);
-    EXPECT_THAT(DriveFixture::cloud->promisedItems().tagNames(url).value,
-        testing::Optional(ElementsAre("Red", "Blue")));
+    EXPECT_THAT(DriveFixture::cloud->promisedItems().readItem(url, {}).tagNames, ElementsAre("Red", "Blue"));
     const auto promise = host::drive::PromiseRecord::parse(contentOf(promiseOf(url)));
     ASSERT_TRUE(promise);
     EXPECT_EQ(contentOf(Url::fileURL(layout().cloud() + '/' + promise->content)), "12345");

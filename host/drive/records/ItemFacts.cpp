@@ -5,7 +5,6 @@
 
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/SmallFile.h"
-#include "host/system/coordination/CoordinatedRead.h"
 #include "host/system/files/PosixFileSystem.h"
 #include "platform/Log.h"
 
@@ -124,25 +123,16 @@ void readPromise(ItemFacts& facts, const std::string& itemPath, int missingReaso
     facts.promisePath = std::move(path);
 }
 
-void look(ItemFacts& facts, const std::string& path)
+/// Fills in what is known of a file after its status was asked for, with `failure` as the answer.
+void describeFile(ItemFacts& facts, const std::string& path, int failure)
 {
-    // Only what the last look left behind is cleared: this is done for every row of a list.
-    if (facts.presence == ItemFacts::Presence::Promised)
-        facts.promise = {};
-    else if (facts.presence == ItemFacts::Presence::Here)
-        facts.marks = {};
-    facts.presence = ItemFacts::Presence::Missing;
-    facts.error.reset();
-    const int failure = status(path, facts.status);
-    if (failure == ENOENT) {
-        readPromise(facts, path, failure);
-    } else if (failure != 0) {
+    if (failure != 0) {
         facts.error = itemError(failure, path);
-    } else {
-        facts.presence = ItemFacts::Presence::Here;
-        if (hasMarks(facts.status))
-            facts.marks = ItemMarks::read(path);
+        return;
     }
+    facts.presence = ItemFacts::Presence::Here;
+    if (hasMarks(facts.status))
+        facts.marks = ItemMarks::read(path);
 }
 
 } // namespace
@@ -179,31 +169,20 @@ std::optional<platform::Date> ItemFacts::modified() const
     return platform::Date{status.stx_mtime.tv_sec * 1'000'000'000 + status.stx_mtime.tv_nsec};
 }
 
-const ItemFacts& lookAtItem(const std::string& path)
+ItemFacts lookAtItem(const std::string& path)
 {
-    static thread_local ItemFacts facts;
-    static thread_local std::string factsPath;
-    static thread_local std::uint64_t factsRead = 0;
-
-    const auto read = host::system::CoordinatedRead::current();
-    if (read != 0 && read == factsRead && path == factsPath)
-        return facts;
-    look(facts, path);
-    factsPath = path;
-    factsRead = read;
+    ItemFacts facts;
+    if (const int failure = status(path, facts.status); failure == ENOENT)
+        readPromise(facts, path, failure);
+    else
+        describeFile(facts, path, failure);
     return facts;
 }
 
 ItemFacts lookAtFile(const std::string& path)
 {
     ItemFacts facts;
-    if (const int failure = status(path, facts.status); failure != 0) {
-        facts.error = itemError(failure, path);
-        return facts;
-    }
-    facts.presence = ItemFacts::Presence::Here;
-    if (hasMarks(facts.status))
-        facts.marks = ItemMarks::read(path);
+    describeFile(facts, path, status(path, facts.status));
     return facts;
 }
 

@@ -56,9 +56,9 @@ struct ItemFacts {
     std::optional<platform::Date> modified() const;
 };
 
-/// Looks at a location: the item and its marks, else its promise. Within one coordinated read on one thread
-/// the last location is looked at once only. The reference is valid until the next look on this thread.
-const ItemFacts& lookAtItem(const std::string& path);
+/// Looks at a location: the item and its marks, else its promise. A promise that cannot be used is an error,
+/// and one line of the log for each look.
+ItemFacts lookAtItem(const std::string& path);
 /// Looks at what lies at a location in the file system; never at a promise.
 ItemFacts lookAtFile(const std::string& path);
 

@@ -37,7 +37,7 @@ Error unusableBookmark(const char* sentence)
 std::optional<Url> documentAtPlace(const DriveLayout& layout, const Bookmark& bookmark)
 {
     const auto path = layout.containerDocuments(bookmark.container) + '/' + bookmark.path;
-    const auto& facts = lookAtItem(path);
+    const auto facts = lookAtItem(path);
     if (facts.presence == ItemFacts::Presence::Missing)
         return std::nullopt;
     const auto found = facts.presence == ItemFacts::Presence::Promised ? facts.promise.documentIdentifier

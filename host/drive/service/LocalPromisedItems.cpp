@@ -41,27 +41,27 @@ LocalPromisedItems::LocalPromisedItems(DriveLayout layout, ItemAttributes attrib
 
 std::optional<Error> LocalPromisedItems::checkPromisedItemIsReachable(const Url& url) const
 {
-    // The look is kept for the attributes that are read next; a promise that cannot be used is still there.
-    const auto& facts = lookAtItem(url.path());
-    return facts.presence == ItemFacts::Presence::Missing ? facts.error : std::nullopt;
+    // A promise that cannot be used is still there.
+    auto facts = lookAtItem(url.path());
+    return facts.presence == ItemFacts::Presence::Missing ? std::move(facts.error) : std::nullopt;
 }
 
 Result<AttributeMap> LocalPromisedItems::promisedItemResourceValues(
     const Url& url, platform::AttributeKeys keys) const
 {
-    const auto& facts = lookAtItem(url.path());
+    const auto facts = lookAtItem(url.path());
     return facts.error ? Result<AttributeMap>(*facts.error) : values(url, facts, keys);
 }
 
 platform::ItemReading LocalPromisedItems::readItem(const Url& url, platform::AttributeKeys keys) const
 {
-    const auto& facts = lookAtItem(url.path());
+    auto facts = lookAtItem(url.path());
     if (facts.presence == ItemFacts::Presence::Missing)
-        return {facts.error, {}, url, {}};
+        return {std::move(facts.error), {}, url, {}};
     const bool isPromised = facts.presence == ItemFacts::Presence::Promised;
     platform::ItemReading reading{{}, {}, isPromised ? Url::fileURL(facts.promisePath) : url, {}};
     if (facts.error) {
-        reading.values.error = facts.error;
+        reading.values.error = std::move(facts.error);
         return reading;
     }
     fill(reading.values.value.emplace(), url, facts, keys);
@@ -69,7 +69,7 @@ platform::ItemReading LocalPromisedItems::readItem(const Url& url, platform::Att
     if (const auto identifier =
             isPromised ? facts.promise.documentIdentifier : facts.marks.documentIdentifier)
         _identifiers->seen(identifier, url.path());
-    reading.tagNames = isPromised ? facts.promise.tags : facts.marks.tags;
+    reading.tagNames = std::move(isPromised ? facts.promise.tags : facts.marks.tags);
     return reading;
 }
 
@@ -142,14 +142,6 @@ Result<Url> LocalPromisedItems::resolveAliasFile(const Url& url) const
     if (const auto missing = checkPromisedItemIsReachable(*target))
         return *missing;
     return target;
-}
-
-Result<std::vector<std::string>> LocalPromisedItems::tagNames(const Url& url) const
-{
-    const auto& facts = lookAtItem(url.path());
-    if (facts.error)
-        return *facts.error;
-    return facts.presence == ItemFacts::Presence::Promised ? facts.promise.tags : facts.marks.tags;
 }
 
 } // namespace host::drive

@@ -34,7 +34,6 @@ public:
     bool isExternalDocumentReference(const platform::Url& url) const override;
     platform::Result<platform::Url> resolveExternalDocumentReference(const platform::Url& url) const override;
     platform::Result<platform::Url> resolveAliasFile(const platform::Url& url) const override;
-    platform::Result<std::vector<std::string>> tagNames(const platform::Url& url) const override;
 
 private:
     platform::AttributeMap values(

@@ -3,7 +3,6 @@
 
 #include "host/system/coordination/LocalFileCoordinator.h"
 
-#include "host/system/coordination/CoordinatedRead.h"
 #include "host/system/files/ItemPaths.h"
 #include "host/system/files/SystemErrors.h"
 #include "platform/Log.h"
@@ -88,7 +87,6 @@ std::optional<Error> LocalFileCoordinator::coordinateReading(
     const Url& url, ReadingOptions options, const Accessor& accessor)
 {
     if (options == ReadingOptions::ImmediatelyAvailableMetadataOnly) {
-        const CoordinatedRead marked;
         accessor(url);
         return std::nullopt;
     }

@@ -84,7 +84,12 @@ public:
     }
     platform::ItemReading readItem(const Url& url, AttributeKeys keys) const override
     {
-        return unreachable || changePromised ? PromisedItems::readItem(url, keys) : _real.readItem(url, keys);
+        auto reading = _real.readItem(url, keys);
+        if (unreachable)
+            return {unreachable, {}, std::move(reading.physicalURL), {}};
+        if (changePromised && !reading.unreachable)
+            changePromised(url, reading.values);
+        return reading;
     }
     Result<AttributeMap> resourceValues(const Url& url, AttributeKeys keys) const override
     {
@@ -105,7 +110,6 @@ public:
         return _real.resolveExternalDocumentReference(url);
     }
     Result<Url> resolveAliasFile(const Url& url) const override { return _real.resolveAliasFile(url); }
-    Result<std::vector<std::string>> tagNames(const Url& url) const override { return _real.tagNames(url); }
 
 private:
     platform::PromisedItems& _real;

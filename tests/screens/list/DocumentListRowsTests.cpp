@@ -5,6 +5,7 @@
 
 #include "tests/screens/support/DocumentListFixture.h"
 
+#include "host/drive/identity/DocumentIndex.h"
 #include "host/drive/records/ItemFacts.h"
 #include "kit/controllers/AlertController.h"
 #include "platform/Localization.h"
@@ -81,6 +82,32 @@ TEST_F(DocumentList, ShowsEveryKindOfItemWithItsDetails)
         testing::AllOf(testing::StartsWith("Trip, Folder, "), HasSubstr(rows[0].detail)));
     EXPECT_THAT(list->listView()->row(2).accessibleDescription,
         testing::AllOf(HasSubstr("Far.pdf"), HasSubstr("In the cloud"), HasSubstr("Work")));
+}
+
+TEST_F(DocumentList, CorrectsTheIndexOfIdentifiersByTheRowsThatItShows)
+{
+    const auto at = [&](const char* path) { return drive.url(path).path(); };
+    const auto indexed = [&](std::uint32_t identifier) {
+        return host::drive::DocumentIndex(drive.layout().index()).lookUp(identifier).place.path;
+    };
+    const auto here = drive.cloud->documentIdentifiers().identify(drive.writeDocument("Documents/here.txt"));
+    const auto promised =
+        drive.cloud->documentIdentifiers().identify(drive.writePromise("Documents/promised.txt", {}));
+    ASSERT_TRUE(here && promised);
+    drive.writeDocument("Stuff/unnumbered.txt");
+    // Another program moves both.
+    std::filesystem::rename(at("Documents/here.txt"), at("Stuff/here.txt"));
+    std::filesystem::rename(at("Documents/.promised.txt.trwpromise"), at("Stuff/.promised.txt.trwpromise"));
+    drive.settle();
+    ASSERT_EQ(indexed(*here), "documents/BrindleDefault/Documents/here.txt");
+
+    const auto list = shownList(drive.url("Stuff"));
+    deliver(list, {{"here.txt"}, {"promised.txt", Kind::Document, true}, {"unnumbered.txt"}});
+    drive.settle();
+    EXPECT_EQ(indexed(*here), "documents/BrindleDefault/Stuff/here.txt");
+    EXPECT_EQ(indexed(*promised), "documents/BrindleDefault/Stuff/promised.txt");
+    EXPECT_EQ(host::drive::documentIdentifierAt(at("Stuff/unnumbered.txt")), 0U) << "reading gives no number";
+    EXPECT_FALSE(std::filesystem::exists(at("Stuff/promised.txt"))) << "reading fetches nothing";
 }
 
 TEST_F(DocumentList, ShowsTheLibrariesAtTheTopOfTheDrive)

@@ -94,7 +94,7 @@ TEST_F(DocumentIdentifierTests, anIdentifierIsGivenOnceAndToOneItem)
     }
     EXPECT_EQ(identify(_drive.url("way/a.txt")), identify(items[0]));
     EXPECT_FALSE(fs::exists(items[3].path()));
-    EXPECT_EQ(_drive.cloud->promisedItems().tagNames(items[3]).value, promise.tags) << "kept";
+    EXPECT_EQ(_drive.cloud->promisedItems().readItem(items[3], {}).tagNames, promise.tags) << "kept";
 
     _drive.writeLink("link", "Documents/a.txt");
     const auto outside = _drive.folder().write("outside.txt", "");
@@ -219,7 +219,7 @@ TEST_F(DocumentIdentifierTests, aCopyGetsAnIdentifierOfItsOwn)
         << "the number of a removed document stays its own";
 }
 
-TEST_F(DocumentIdentifierTests, aRowThatIsReadCorrectsTheIndex)
+TEST_F(DocumentIdentifierTests, anItemThatIsReadCorrectsTheIndex)
 {
     const auto identifier = identify(document());
     moveByOthers("Documents/a.txt", "Desktop/b.txt");

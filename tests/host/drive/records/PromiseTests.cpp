@@ -2,7 +2,6 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "host/drive/records/PromiseRecord.h"
-#include "host/system/coordination/CoordinatedRead.h"
 #include "platform/FileCoordinator.h"
 #include "tests/support/DriveFixture.h"
 
@@ -138,7 +137,7 @@ TEST_F(PromiseTests, isDescribedWithoutItsContent)
     EXPECT_EQ(values->optional<SharedItemRole>(AttributeKey::SharedItemRole), SharedItemRole::Participant);
     EXPECT_TRUE(values->flag(AttributeKey::IsShared));
     EXPECT_EQ(values->optional<std::uint64_t>(AttributeKey::DocumentIdentifier), 4'000'000'000u);
-    EXPECT_EQ(items().tagNames(url).value, wholeRecord().tags);
+    EXPECT_EQ(items().readItem(url, {}).tagNames, wholeRecord().tags);
     EXPECT_TRUE(items().resourceValues(url, allKeys).error->is(FileErrorCode::NoSuchItem));
 }
 
@@ -196,7 +195,7 @@ TEST_F(PromiseTests, theRealItemCountsWhereBothExist)
     ASSERT_TRUE(values);
     EXPECT_EQ(values->optional<std::uint64_t>(AttributeKey::FileSize), 4u);
     EXPECT_FALSE(values->has(AttributeKey::DownloadingStatus));
-    EXPECT_EQ(items().tagNames(url).value, std::vector<std::string>());
+    EXPECT_TRUE(items().readItem(url, {}).tagNames.empty());
 
     // A broken link is an item as well.
     const auto link = _drive.writePromise("Link.pdf", record);
@@ -218,14 +217,11 @@ TEST_F(PromiseTests, aDamagedPromiseIsAnErrorOfItsOwnAndOneLine)
     for (const auto& text : texts) {
         const auto path = writeRawPromise(text);
         _drive.log->clear();
-        platform::services().fileCoordinator().coordinateReading(url,
-            platform::ReadingOptions::ImmediatelyAvailableMetadataOnly, [&](const platform::Url& location) {
-                EXPECT_FALSE(items().checkPromisedItemIsReachable(location));
-                const auto values = items().promisedItemResourceValues(location, allKeys);
-                EXPECT_FALSE(values) << text.substr(0, 40);
-                EXPECT_FALSE(values.error->is(FileErrorCode::NoSuchItem));
-                EXPECT_FALSE(items().tagNames(location));
-            });
+        const auto reading = items().readItem(url, allKeys);
+        EXPECT_FALSE(reading.unreachable);
+        EXPECT_FALSE(reading.values) << text.substr(0, 40);
+        EXPECT_FALSE(reading.values.error->is(FileErrorCode::NoSuchItem));
+        EXPECT_TRUE(reading.tagNames.empty());
         EXPECT_THAT(_drive.log->lines(), ElementsAre(StartsWith("ERROR Cannot use the promise " + path)));
         EXPECT_EQ(std::filesystem::file_size(path), text.size()) << "it is left as it is";
     }
@@ -256,26 +252,6 @@ TEST_F(PromiseTests, aNameTooLongForAPromiseIsSimplyMissing)
     EXPECT_TRUE(items().checkPromisedItemIsReachable(url)->is(FileErrorCode::NoSuchItem));
     EXPECT_TRUE(items().physicalURLForPromise(url).isSameObject(url));
     EXPECT_TRUE(_drive.log->lines().empty());
-}
-
-TEST_F(PromiseTests, aLookIsKeptWithinOneCoordinatedReadOnly)
-{
-    const auto url = _drive.writePromise("Plan.pdf", wholeRecord());
-    const auto size = [&] {
-        const auto values = items().promisedItemResourceValues(url, allKeys);
-        return values ? values->optional<std::uint64_t>(AttributeKey::FileSize) : std::nullopt;
-    };
-    {
-        const host::system::CoordinatedRead read;
-        EXPECT_EQ(size(), 12'345u);
-        {
-            const host::system::CoordinatedRead inner;
-            _drive.writeDocument("Plan.pdf", "real");
-            EXPECT_EQ(size(), 4u) << "another read looks for itself";
-        }
-    }
-    const host::system::CoordinatedRead next;
-    EXPECT_EQ(size(), 4u);
 }
 
 } // namespace

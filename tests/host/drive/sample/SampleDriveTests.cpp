@@ -129,7 +129,7 @@ TEST_F(SampleDriveTests, holdsEveryKindOfItem)
         references += _cloud->promisedItems().isExternalDocumentReference(url);
         if (type == platform::typeIdentifier::symlink)
             ++(_cloud->items().isInDocumentsArea(_cloud->items().realURL(url)) ? linksIn : linksOut);
-        const auto names = _cloud->promisedItems().tagNames(url).value.value_or(std::vector<std::string>());
+        const auto names = _cloud->promisedItems().readItem(url, {}).tagNames;
         tags.insert(names.begin(), names.end());
     }
     EXPECT_EQ(kinds.size(), 8u) << testing::PrintToString(kinds);

@@ -122,7 +122,7 @@ TEST_F(ItemTests, tagsAreReadInTheirOrder)
 {
     const auto url = _drive.writeDocument("a.txt");
     using Tags = std::vector<std::string>;
-    EXPECT_EQ(items().tagNames(url).value, Tags());
+    EXPECT_EQ(items().readItem(url, {}).tagNames, Tags());
     const std::pair<std::string, Tags> rows[] = {
         {"Work", {"Work"}},
         {"b,a,b", {"b", "a", "b"}},
@@ -133,9 +133,9 @@ TEST_F(ItemTests, tagsAreReadInTheirOrder)
     };
     for (const auto& [attribute, tags] : rows) {
         _drive.mark(url, itemMark::tags, attribute);
-        EXPECT_EQ(items().tagNames(url).value, tags) << attribute.substr(0, 40);
+        EXPECT_EQ(items().readItem(url, {}).tagNames, tags) << attribute.substr(0, 40);
     }
-    EXPECT_TRUE(items().tagNames(_drive.url("gone")).error->is(FileErrorCode::NoSuchItem));
+    EXPECT_TRUE(items().readItem(_drive.url("gone"), {}).unreachable->is(FileErrorCode::NoSuchItem));
 }
 
 TEST_F(ItemTests, namesAreKeptAsBytesAndShownAsText)
