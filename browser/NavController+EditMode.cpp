@@ -209,11 +209,10 @@ std::string NavController::quotaAvailableString() const
 std::vector<platform::Color> NavController::documentListControllerColorsForTagNames(
     const List&, const std::vector<std::string>& names)
 {
-    const auto colors = FileTags::tagColorsByTag();
     std::vector<platform::Color> dots;
     for (const auto& name : names) {
-        if (const auto found = colors.find(name); found != colors.end())
-            dots.push_back(found->second);
+        if (const auto color = FileTags::colorOfTag(name))
+            dots.push_back(*color);
     }
     return dots;
 }

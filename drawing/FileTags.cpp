@@ -75,11 +75,22 @@ void add(Tags& tags, const PropertyValue& value)
     tags.colors.insert_or_assign(*name, colors[index < colors.size() ? index : 0]);
 }
 
-void observeOnce()
+void observe()
 {
     static const auto observation =
         services().notificationCenter().observe(platform::Notification::KeyValueStoreDidChangeExternally,
             [](const auto&) { FileTags::_tagColorsDidChange(); });
+}
+
+/// The table; the first call reads it and has it follow the store.
+std::shared_ptr<const Tags> currentTags()
+{
+    static std::once_flag once;
+    std::call_once(once, [] {
+        observe();
+        FileTags::_tagColorsDidChange();
+    });
+    return current().tags();
 }
 
 } // namespace
@@ -97,20 +108,21 @@ const std::array<Color, 8>& FileTags::_tagBlipColors()
     return colors;
 }
 
+std::optional<Color> FileTags::colorOfTag(std::string_view name)
+{
+    const auto tags = currentTags();
+    const auto found = tags->colors.find(name);
+    return found == tags->colors.end() ? std::nullopt : std::optional(found->second);
+}
+
 FileTags::ColorsByTag FileTags::tagColorsByTag()
 {
-    static std::once_flag once;
-    std::call_once(once, [] {
-        observeOnce();
-        _tagColorsDidChange();
-    });
-    return current().tags()->colors;
+    return currentTags()->colors;
 }
 
 std::vector<std::string> FileTags::allTags()
 {
-    tagColorsByTag();
-    return current().tags()->names;
+    return currentTags()->names;
 }
 
 void FileTags::_tagColorsDidChange()

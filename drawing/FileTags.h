@@ -7,7 +7,9 @@
 
 #include <array>
 #include <map>
+#include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace tarrow {
@@ -21,6 +23,8 @@ public:
 
     FileTags() = delete;
 
+    /// Answers the colour of one tag without copying the table, and nothing for a name that it does not hold.
+    static std::optional<platform::Color> colorOfTag(std::string_view name);
     /// Answers a copy of the table's colours. A name that occurs twice in the table has the later colour.
     static ColorsByTag tagColorsByTag();
     /// Answers a copy of the table's names in its order; a name that occurs twice is answered twice.

@@ -54,6 +54,8 @@ TEST_F(FileTagsTest, TheTableFollowsTheStore)
     EXPECT_EQ(byTag.at("Far"), colors[0]);
     EXPECT_EQ(byTag.at("Odd"), colors[0]);
     EXPECT_EQ(byTag.at(""), colors[7]);
+    EXPECT_EQ(FileTags::colorOfTag("Work"), colors[6]);
+    EXPECT_EQ(FileTags::colorOfTag("work"), std::nullopt);
 
     drive.log->clear();
     storeTags(R"({"n": "Work", "l": 2})", 1);
