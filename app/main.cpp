@@ -110,7 +110,8 @@ DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale)
         DriveLayout::fromEnvironment(), dependencies, {.languages = locale.languageList()});
     set.cloudDocumentService = cloud;
     set.activityHandOver = LocalActivityHandOver::create(cloud->layout(), dependencies, cloud);
-    set.fileSystem = std::make_shared<host::system::PosixFileSystem>(cloud->itemChanges());
+    set.fileChanges = cloud->fileChanges();
+    set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
     set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>(
         host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination(),
             .root = cloud->layout().documents(),

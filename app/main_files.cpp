@@ -9,6 +9,7 @@
 #include "host/system/queues/GLibDispatch.h"
 #include "items/DocumentIdentifiers.h"
 #include "items/FileUtils.h"
+#include "platform/FileChanges.h"
 #include "platform/FileSystem.h"
 #include "platform/NotificationCenter.h"
 
@@ -39,7 +40,8 @@ std::shared_ptr<LocalCloudDocumentService> installDrive(const std::shared_ptr<pl
     set.cloudDocumentService = cloud;
     set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>(
         host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination()});
-    set.fileSystem = std::make_shared<host::system::PosixFileSystem>(cloud->itemChanges());
+    set.fileChanges = cloud->fileChanges();
+    set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
     platform::installServices(std::move(set));
     return cloud;
 }
@@ -97,7 +99,7 @@ int fetch(const Url& url, host::system::GLibDispatch& dispatch)
 int save(const Url& url, const Url& from)
 {
     constexpr std::size_t mostBytes = 64UL * 1024 * 1024;
-    auto& files = platform::services().fileSystem();
+    auto& files = platform::services().fileChanges();
     const auto content = files.contentToReplace(from.path(), mostBytes);
     const auto before = files.contentToReplace(url.path(), mostBytes);
     if (!content || !before)

@@ -97,9 +97,11 @@ public:
         set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
         set.pagedDocumentOpener = std::make_shared<host::previews::PopplerDocuments>();
         set.typeRegistry = std::make_shared<host::system::MimeTypeRegistry>();
-        set.cloudDocumentService = host::drive::LocalCloudDocumentService::create(layout,
+        const auto cloud = host::drive::LocalCloudDocumentService::create(layout,
             {set.dispatch, set.notificationCenter, set.typeRegistry, nullptr, nullptr},
             {.languages = {"en"}});
+        set.cloudDocumentService = cloud;
+        set.fileChanges = cloud->fileChanges();
         platform::installServices(std::move(set));
         _folder = layout.defaultContainer();
         std::filesystem::create_directories(_folder);

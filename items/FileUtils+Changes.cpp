@@ -3,8 +3,8 @@
 
 #include "items/FileUtils.h"
 
+#include "platform/FileChanges.h"
 #include "platform/FileCoordinator.h"
-#include "platform/FileSystem.h"
 
 namespace tarrow {
 
@@ -17,9 +17,9 @@ platform::FileCoordinator& coordinator()
     return services().fileCoordinator();
 }
 
-platform::FileSystem& files()
+platform::FileChanges& changes()
 {
-    return services().fileSystem();
+    return services().fileChanges();
 }
 
 std::optional<Date> modificationDate(const Url& url)
@@ -42,7 +42,7 @@ std::optional<Error> removeUnchanged(const Url& location, const KnownState& befo
     const auto date = modificationDate(location);
     std::optional<Error> error = Error(FileErrorCode::Cancelled);
     if (date && date == before.date)
-        error = files().removeItem(location.path(), before.version);
+        error = changes().removeItem(location.path(), before.version);
     if (!error)
         op.info("Deleted item: '%@'", location);
     else if (error->is(FileErrorCode::Cancelled))
@@ -59,7 +59,7 @@ std::optional<Error> moveAnnounced(const Url& source, const Url& destination)
     coordinator().itemWillMove(source, destination);
     op.debug("Moving src2:  '%@'", source);
     op.debug("Moving dest2: '%@'", destination);
-    auto error = files().moveItem(source.path(), destination.path());
+    auto error = changes().moveItem(source.path(), destination.path());
     if (error) {
         op.warning("KD Move failed: %@", *error);
         return error;
@@ -94,7 +94,7 @@ std::optional<Error> FileUtils::mkdir(const Url& url)
     op.debug("Creating directory: '%@'", url);
     std::optional<Error> failed;
     const auto refused = coordinator().coordinateWriting(url, WritingOptions::None, [&](const Url& location) {
-        failed = files().createFolder(location.path());
+        failed = changes().createFolder(location.path());
         if (failed)
             op.error("failed to create directory:'%@': %@", location, *failed);
         else
@@ -110,7 +110,7 @@ std::optional<Error> FileUtils::remove(const Url& url)
     static constexpr Operation op{"+[FileUtils remove:]"};
     op.debug("Removing item: '%@'", url);
     // The version is read first, so that a change between the two reads shows in the date.
-    const auto version = files().versionOfItem(url.path());
+    const auto version = changes().versionOfItem(url.path());
     const KnownState before{modificationDate(url), version};
     std::optional<Error> failed;
     const auto refused = coordinator().coordinateWriting(url, WritingOptions::ForDeleting,

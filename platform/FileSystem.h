@@ -8,10 +8,8 @@
 
 #include <cstdint>
 #include <functional>
-#include <memory>
 #include <optional>
 #include <string>
-#include <string_view>
 
 namespace platform {
 
@@ -27,29 +25,12 @@ struct FileAttributes {
     bool extensionHidden = false; ///< the person does not want to see the name's extension
 };
 
-/// Names the state of an item that was looked at. While two looks are equal, nothing has changed the item in
-/// between.
-struct ItemVersion {
-    std::uint64_t device = 0, inode = 0; ///< by which the system tells items apart
-    std::uint64_t size = 0; ///< bytes
-    /// When the content was changed last, and when anything of the item was (also its name or an attribute),
-    /// in nanoseconds since 1970.
-    std::int64_t modified = 0, changed = 0;
-    bool operator==(const ItemVersion&) const = default;
-};
-
-/// A document's bytes, together with the state of the document that they are.
-struct FileContent {
-    std::shared_ptr<const std::string> bytes; ///< never null when a call answers it
-    ItemVersion version; ///< the state in which they were read or written
-};
-
-/// The file system, without coordination: who needs others kept out calls it inside an accessor of the
-/// FileCoordinator. Questions know nothing of promises. Changes take a promise for the item that it stands
-/// for, stay within the drive (EXDEV elsewhere) and follow no link. Paths are absolute, and are bytes as the
-/// system has them; one that holds a NUL is refused. Any thread may call; every call is synchronous and waits
-/// for the disk. Unless a comment says otherwise errors are the system's: FileErrorCode::NoSuchItem,
-/// ItemExists and InvalidName where they fit, else the errno. Each has a sentence for the user.
+/// The questions to the file system, without coordination: who needs others kept out asks inside an accessor
+/// of the FileCoordinator. They know nothing of promises; FileChanges changes what they tell of. Paths are
+/// absolute, and are bytes as the system has them; one that holds a NUL is refused. Any thread may ask; every
+/// call is synchronous and waits for the disk. Unless a comment says otherwise errors are the system's:
+/// FileErrorCode::NoSuchItem and InvalidName where they fit, else the errno. Each has a sentence for the
+/// user.
 class FileSystem {
 public:
     virtual ~FileSystem() = default;
@@ -79,43 +60,6 @@ public:
     virtual void enumerateShallowly(const Url& folder,
         const std::function<Continue(const Url&, FileType)>& entry,
         const std::function<Continue(const Url&, const Error&)>& error) const = 0;
-
-    /// Answers the version of an item, or of its promise; nothing when neither is there, and outside of the
-    /// drive.
-    virtual std::optional<ItemVersion> versionOfItem(const std::string& path) const = 0;
-    /// Makes a folder and those on the way to it that are missing. A folder that is there already is no
-    /// error. When the folder cannot be made, those that were made on the way go again. Errors: ItemExists
-    /// also where a promise has the name.
-    virtual std::optional<Error> createFolder(const std::string& path) = 0;
-    /// Removes an item for good: a folder with everything in it, a promise with its content in the cloud, a
-    /// link and not its target. All of it goes or nothing. An item that is not `unchangedSince` any more, or
-    /// changes while it is being removed, is kept (FileErrorCode::Cancelled); so is a folder with something
-    /// in it that may not be removed, or that is mounted (EBUSY).
-    virtual std::optional<Error> removeItem(
-        const std::string& path, const std::optional<ItemVersion>& unchangedSince) = 0;
-    /// Moves an item to a location, whose last name is the item's new one. Nothing is ever replaced
-    /// (FileErrorCode::ItemExists), and the item is whole under one of its names at every moment, also when
-    /// the process is killed. To another file system it is copied, compared and then removed; one that
-    /// changes meanwhile stays where it was (FileErrorCode::Cancelled). Errors: EINVAL for a folder that
-    /// would come to lie in itself.
-    virtual std::optional<Error> moveItem(const std::string& from, const std::string& to) = 0;
-
-    /// Reads all of a document, as it was at one moment, to be replaced later. Errors: EFBIG beyond
-    /// `maximumBytes`; EACCES or EROFS when the document or its folder must not be written; EBUSY when the
-    /// document changed in each of three attempts; FileErrorCode::NoSuchItem when there is none and when it
-    /// is only promised; FileErrorCode::Unsupported for what is no file.
-    virtual Result<FileContent> contentToReplace(const std::string& path, std::size_t maximumBytes) const = 0;
-    /// Replaces a document's content and answers the version of the new one. The new content lies whole on
-    /// the disk before it gets the name in one step, and it takes over identifier, tags and access. A
-    /// document that does not hold `before` any more, because another program saved it, is kept
-    /// (FileErrorCode::Cancelled); other tags or a new name are no such change.
-    virtual Result<ItemVersion> replaceContent(
-        const std::string& path, const FileContent& before, std::string_view content) = 0;
-    /// Makes a document with the tags and the access of another one, `like`, as far as that one is there; the
-    /// identifier stays with the other one. Nothing is ever replaced (FileErrorCode::ItemExists), and a
-    /// document that cannot be made whole leaves nothing.
-    virtual std::optional<Error> addDocument(
-        const std::string& path, const std::string& like, std::string_view content) = 0;
 };
 
 } // namespace platform

@@ -9,6 +9,7 @@
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
 #include "platform/DocumentSharing.h"
+#include "platform/FileChanges.h"
 #include "platform/FileCoordinator.h"
 #include "platform/FileSystem.h"
 #include "platform/FolderLister.h"

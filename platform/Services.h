@@ -13,6 +13,7 @@ class CharacterData;
 class CloudDocumentService;
 class Dispatch;
 class DocumentSharing;
+class FileChanges;
 class FileCoordinator;
 class FileSystem;
 class FolderLister;
@@ -46,9 +47,11 @@ struct ServiceSet {
     std::shared_ptr<Dispatch> dispatch;
     /// Clipboard, mail, file manager and printer.
     std::shared_ptr<DocumentSharing> documentSharing;
+    /// Changes of the drive's items.
+    std::shared_ptr<FileChanges> fileChanges;
     /// Turns of readers and writers, within the process and between processes.
     std::shared_ptr<FileCoordinator> fileCoordinator;
-    /// Questions to the file system, and changes of the drive.
+    /// Questions to the file system.
     std::shared_ptr<FileSystem> fileSystem;
     /// Sorted lists of folders that follow their changes.
     std::shared_ptr<FolderLister> folderLister;
@@ -98,6 +101,7 @@ public:
     CloudDocumentService& cloudDocumentService() const { return *_set.cloudDocumentService; }
     Dispatch& dispatch() const { return *_set.dispatch; }
     DocumentSharing& documentSharing() const { return *_set.documentSharing; }
+    FileChanges& fileChanges() const { return *_set.fileChanges; }
     FileCoordinator& fileCoordinator() const { return *_set.fileCoordinator; }
     FileSystem& fileSystem() const { return *_set.fileSystem; }
     FolderLister& folderLister() const { return *_set.folderLister; }

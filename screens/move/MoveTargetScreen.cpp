@@ -6,6 +6,7 @@
 #include "kit/controllers/AlertController.h"
 #include "kit/controllers/NavigationItem.h"
 #include "kit/views/ListView.h"
+#include "platform/FileChanges.h"
 #include "platform/FileCoordinator.h"
 #include "platform/FileSystem.h"
 #include "platform/Localization.h"
@@ -195,7 +196,7 @@ void MoveTargetScreen::makeFolder(const std::string& name)
         std::optional<Error> failed;
         const auto refused = services().fileCoordinator().coordinateWriting(
             made, WritingOptions::None, [&failed](const Url& location) {
-                failed = services().fileSystem().createFolder(location.path());
+                failed = services().fileChanges().createFolder(location.path());
             });
         main->async(weakly(weak, &MoveTargetScreen::folderWasMade, made, refused ? refused : failed));
     });

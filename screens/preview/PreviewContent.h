@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "platform/FileSystem.h"
+#include "platform/FileChanges.h"
 #include "platform/Geometry.h"
 #include "platform/ImageLoader.h"
 #include "platform/PagedDocument.h"

@@ -8,7 +8,7 @@
 #include "kit/views/Button.h"
 #include "kit/views/TextField.h"
 #include "platform/Dispatch.h"
-#include "platform/FileSystem.h"
+#include "platform/FileChanges.h"
 #include "platform/ItemDownload.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
@@ -197,7 +197,7 @@ void PreviewController::load(const PreviewLimits& limits)
     _queue->addOperation([weak = std::weak_ptr(self()), item = *_item, limits, generation = _generation, main,
                              cancelled = _cancelled, saved = _savedVersion] {
         // The screen already shows the version that was saved here.
-        if (*cancelled || (saved && services().fileSystem().versionOfItem(item.path()) == saved))
+        if (*cancelled || (saved && services().fileChanges().versionOfItem(item.path()) == saved))
             return;
         const auto content = std::make_shared<const PreviewContent>(
             loadPreview(item, limits, [&] { return cancelled->load(); }));

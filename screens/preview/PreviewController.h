@@ -6,7 +6,7 @@
 #include "kit/controllers/BarButtonItem.h"
 #include "kit/controllers/ViewController.h"
 #include "platform/Error.h"
-#include "platform/FileSystem.h"
+#include "platform/FileChanges.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Url.h"
 #include "screens/PlatformNames.h"

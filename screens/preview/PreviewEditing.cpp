@@ -70,7 +70,7 @@ public:
         bool isSame = false;
         services().fileCoordinator().coordinateReading(
             item, ReadingOptions::ImmediatelyAvailableMetadataOnly, [&](const Url& location) {
-                auto version = services().fileSystem().versionOfItem(location.path());
+                auto version = services().fileChanges().versionOfItem(location.path());
                 if (version)
                     version->changed = _content.version.changed; // a changed tag is not a changed content
                 isSame = version == _content.version;
@@ -83,7 +83,7 @@ public:
     /// Answers where the document is: at the other place, if it was moved there.
     Url placeOf(const Url& item, const std::optional<Url>& other) const
     {
-        const auto moved = other ? services().fileSystem().versionOfItem(other->path()) : std::nullopt;
+        const auto moved = other ? services().fileChanges().versionOfItem(other->path()) : std::nullopt;
         const bool isThere =
             moved && moved->device == _content.version.device && moved->inode == _content.version.inode;
         return isThere ? *other : item;
@@ -112,7 +112,7 @@ private:
         Result<ItemVersion> replaced = Error(FileErrorCode::Cancelled);
         const auto refused = services().fileCoordinator().coordinateWriting(
             item, WritingOptions::ForReplacing, [&](const Url& location) {
-                replaced = services().fileSystem().replaceContent(location.path(), _content, bytes);
+                replaced = services().fileChanges().replaceContent(location.path(), _content, bytes);
             });
         if (refused)
             return {EditsKept::Where::Nowhere, item, refused};
@@ -134,7 +134,7 @@ private:
             const auto copy = folder.appendingPathComponent(copyName(item.lastPathComponent(), number));
             const auto refused = services().fileCoordinator().coordinateWriting(
                 copy, WritingOptions::None, [&](const Url& location) {
-                    error = services().fileSystem().addDocument(location.path(), item.path(), bytes);
+                    error = services().fileChanges().addDocument(location.path(), item.path(), bytes);
                 });
             if (refused || !error)
                 return {refused ? EditsKept::Where::Nowhere : EditsKept::Where::Copy, copy, refused};
@@ -158,8 +158,8 @@ void PreviewEditing::begin(const Url& item, Opened opened)
         Result<FileContent> content = Error(FileErrorCode::NoSuchItem);
         auto error = services().fileCoordinator().coordinateReading(
             item, ReadingOptions::ImmediatelyAvailableMetadataOnly, [&](const Url& location) {
-                content =
-                    services().fileSystem().contentToReplace(location.path(), PagedDocumentEditing::maxBytes);
+                content = services().fileChanges().contentToReplace(
+                    location.path(), PagedDocumentEditing::maxBytes);
             });
         if (!error && !content)
             error = content.error;

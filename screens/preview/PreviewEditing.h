@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "platform/FileSystem.h"
+#include "platform/FileChanges.h"
 #include "platform/PagedDocumentEditing.h"
 #include "platform/Url.h"
 #include "screens/PlatformNames.h"
@@ -43,7 +43,7 @@ public:
     class Work;
     PreviewEditing(Url item, std::shared_ptr<Work> work); ///< use begin()
 
-    /// Reads a document to change it. The errors are those of FileSystem::contentToReplace() and
+    /// Reads a document to change it. The errors are those of FileChanges::contentToReplace() and
     /// PagedDocumentOpener::openForEditing().
     static void begin(const Url& item, Opened opened);
 

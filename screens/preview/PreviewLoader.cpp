@@ -5,6 +5,7 @@
 
 #include "kit/values/Screen.h"
 #include "platform/CloudDocumentService.h"
+#include "platform/FileChanges.h"
 #include "platform/FileCoordinator.h"
 #include "platform/FileSystem.h"
 #include "platform/Formatters.h"
@@ -141,7 +142,7 @@ PreviewContent textContent(PreviewContent content, const Reading& reading, bool 
 
 PreviewContent pagesContent(PreviewContent content)
 {
-    content.version = services().fileSystem().versionOfItem(content.path);
+    content.version = services().fileChanges().versionOfItem(content.path);
     const auto opened = services().pagedDocumentOpener().open(content.path);
     if (!opened.value)
         return failure(std::move(content),

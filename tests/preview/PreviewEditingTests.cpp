@@ -5,7 +5,7 @@
 #include "kit/controllers/AlertController.h"
 #include "kit/views/Button.h"
 #include "kit/views/TextField.h"
-#include "platform/FileSystem.h"
+#include "platform/FileChanges.h"
 #include "platform/PagedDocumentEditing.h"
 #include "screens/preview/NoteView.h"
 #include "screens/preview/PreviewContent.h"

@@ -96,7 +96,8 @@ DriveFixture::DriveFixture()
     set.cloudDocumentService = cloud;
     handOver = host::drive::LocalActivityHandOver::create(cloud->layout(), dependencies, cloud);
     set.activityHandOver = handOver;
-    set.fileSystem = std::make_shared<host::system::PosixFileSystem>(cloud->itemChanges());
+    set.fileChanges = cloud->fileChanges();
+    set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
     set.storageOfferManager = cloud->storageOffers();
     set.keyValueStore = cloud->keyValueStore();
     set.fileCoordinator = fileCoordinator;

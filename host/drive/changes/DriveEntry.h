@@ -7,7 +7,7 @@
 #include "host/system/files/FileDescriptor.h"
 #include "host/system/files/FileVersion.h"
 #include "host/system/files/SystemError.h"
-#include "platform/FileSystem.h"
+#include "platform/FileChanges.h"
 
 #include <sys/stat.h>
 

@@ -5,7 +5,7 @@
 
 #include "host/drive/changes/DriveEntry.h"
 #include "host/drive/changes/TreeWalk.h"
-#include "host/system/files/ItemChanges.h"
+#include "platform/FileChanges.h"
 
 #include <memory>
 
@@ -20,7 +20,7 @@ class CloudStore;
 ///
 /// To another file system an item is moved by a copy under a temporary name, which is compared, synced and
 /// renamed; only then is the original removed, and when that fails the copy is withdrawn.
-class LocalItemChanges : public host::system::ItemChanges {
+class LocalItemChanges : public platform::FileChanges {
 public:
     LocalItemChanges(DriveLayout layout, std::shared_ptr<CloudStore> store)
         : _layout(std::move(layout))

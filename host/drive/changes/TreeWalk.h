@@ -5,7 +5,7 @@
 
 #include "host/system/files/FileDescriptor.h"
 #include "host/system/files/SystemError.h"
-#include "platform/FileSystem.h"
+#include "platform/FileChanges.h"
 
 #include <sys/stat.h>
 

@@ -30,8 +30,8 @@ public:
         const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings);
 
     const DriveLayout& layout() const { return _layout; }
-    /// What changes the drive's items; for the file system that is installed beside this service.
-    std::shared_ptr<IndexedItemChanges> itemChanges() const { return _itemChanges; }
+    /// The changes of the drive's items.
+    std::shared_ptr<platform::FileChanges> fileChanges() const { return _itemChanges; }
     /// The account's storage offer; it follows the same file.
     const std::shared_ptr<LocalStorageOfferManager>& storageOffers() const { return _storageOffers; }
     /// The values that the account's devices share.

@@ -43,8 +43,8 @@ std::string sortKey(const std::string& name)
 
 } // namespace
 
-LocalContainers::LocalContainers(DriveLayout layout, std::vector<std::string> languages,
-    std::shared_ptr<host::system::ItemChanges> changes)
+LocalContainers::LocalContainers(
+    DriveLayout layout, std::vector<std::string> languages, std::shared_ptr<platform::FileChanges> changes)
     : _layout(std::move(layout))
     , _languages(std::move(languages))
     , _changes(std::move(changes))

@@ -5,8 +5,8 @@
 
 #include "host/drive/records/ContainerRecord.h"
 #include "host/drive/records/DriveLayout.h"
-#include "host/system/files/ItemChanges.h"
 #include "platform/DocumentContainers.h"
+#include "platform/FileChanges.h"
 
 #include <map>
 #include <mutex>
@@ -21,7 +21,7 @@ class LocalContainers : public platform::DocumentContainers {
 public:
     /// `languages`: the user's, the preferred one first ("de_DE", "de", ...).
     LocalContainers(DriveLayout layout, std::vector<std::string> languages,
-        std::shared_ptr<host::system::ItemChanges> changes);
+        std::shared_ptr<platform::FileChanges> changes);
 
     std::string defaultContainerIdentifier() const override;
     std::optional<platform::Url> defaultContainerURL() const override;
@@ -58,7 +58,7 @@ private:
 
     DriveLayout _layout;
     std::vector<std::string> _languages;
-    std::shared_ptr<host::system::ItemChanges> _changes;
+    std::shared_ptr<platform::FileChanges> _changes;
     mutable std::mutex _mutex;
     mutable std::map<std::string, Known> _known;
 };

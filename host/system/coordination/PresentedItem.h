@@ -4,7 +4,7 @@
 #pragma once
 
 #include "host/system/files/FileDescriptor.h"
-#include "platform/FileSystem.h"
+#include "platform/FileChanges.h"
 
 #include <optional>
 #include <string>

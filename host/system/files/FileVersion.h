@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "platform/FileSystem.h"
+#include "platform/FileChanges.h"
 
 #include <sys/stat.h>
 

@@ -117,47 +117,4 @@ void PosixFileSystem::enumerateShallowly(const platform::Url& folder,
         error(folder, systemError(reader.errorNumber(), folder.path()));
 }
 
-std::optional<platform::ItemVersion> PosixFileSystem::versionOfItem(const std::string& path) const
-{
-    return _changes ? _changes->versionOfItem(path) : std::nullopt;
-}
-
-std::optional<platform::Error> PosixFileSystem::createFolder(const std::string& path)
-{
-    return _changes ? _changes->createFolder(path) : systemError(EROFS, path);
-}
-
-std::optional<platform::Error> PosixFileSystem::removeItem(
-    const std::string& path, const std::optional<platform::ItemVersion>& unchangedSince)
-{
-    return _changes ? _changes->removeItem(path, unchangedSince) : systemError(EROFS, path);
-}
-
-std::optional<platform::Error> PosixFileSystem::moveItem(const std::string& from, const std::string& to)
-{
-    return _changes ? _changes->moveItem(from, to) : systemError(EROFS, from, to);
-}
-
-platform::Result<platform::FileContent> PosixFileSystem::contentToReplace(
-    const std::string& path, std::size_t maximumBytes) const
-{
-    if (!_changes)
-        return systemError(EROFS, path);
-    return _changes->contentToReplace(path, maximumBytes);
-}
-
-platform::Result<platform::ItemVersion> PosixFileSystem::replaceContent(
-    const std::string& path, const platform::FileContent& before, std::string_view content)
-{
-    if (!_changes)
-        return systemError(EROFS, path);
-    return _changes->replaceContent(path, before, content);
-}
-
-std::optional<platform::Error> PosixFileSystem::addDocument(
-    const std::string& path, const std::string& like, std::string_view content)
-{
-    return _changes ? _changes->addDocument(path, like, content) : systemError(EROFS, path);
-}
-
 } // namespace host::system

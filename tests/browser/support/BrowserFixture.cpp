@@ -50,6 +50,7 @@ BrowserFixture::BrowserFixture()
     set.cloudDocumentService = cloud;
     set.dispatch = drive.dispatch;
     set.documentSharing = std::make_shared<RecordingSharing>();
+    set.fileChanges = borrowed(_driveServices.fileChanges());
     set.fileCoordinator = borrowed(_driveServices.fileCoordinator());
     set.fileSystem = borrowed(_driveServices.fileSystem());
     set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(drive.dispatch, types, "en_US");

@@ -28,7 +28,8 @@ ItemsFixture::ItemsFixture()
     set.cloudDocumentService = decorated;
     set.dispatch = dispatch;
     set.fileCoordinator = coordinator;
-    set.fileSystem = std::make_shared<host::system::PosixFileSystem>(DriveFixture::cloud->itemChanges());
+    set.fileChanges = DriveFixture::cloud->fileChanges();
+    set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
     set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
     set.localization = texts;
     set.notificationCenter = notifications;

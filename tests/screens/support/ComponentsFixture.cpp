@@ -87,6 +87,7 @@ ComponentsFixture::ComponentsFixture()
     _set.cloudDocumentService = drive.cloud;
     _set.documentSharing = sharing;
     _set.dispatch = drive.dispatch;
+    _set.fileChanges = borrowed(_driveServices.fileChanges());
     _set.fileCoordinator = coordinator;
     _set.fileSystem = borrowed(_driveServices.fileSystem());
     _set.folderLister = lister;

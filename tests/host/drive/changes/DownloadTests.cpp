@@ -239,7 +239,7 @@ TEST_F(DownloadTest, WhatHappensMeanwhileCounts)
     EXPECT_TRUE(error->is(FileErrorCode::NoSuchItem));
     EXPECT_FALSE(fs::exists(deleted.path()));
     store.beforeFetch = [&] {
-        EXPECT_FALSE(cloud->itemChanges()->moveItem(moved.path(), url("there").path()));
+        EXPECT_FALSE(cloud->fileChanges()->moveItem(moved.path(), url("there").path()));
     };
     EXPECT_TRUE(host::drive::bringHere(layout(), store, moved.path(), goOn));
     EXPECT_FALSE(fs::exists(moved.path()));

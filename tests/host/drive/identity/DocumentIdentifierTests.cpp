@@ -54,11 +54,11 @@ protected:
     }
     void move(const std::string& from, const std::string& to)
     {
-        ASSERT_EQ(_drive.cloud->itemChanges()->moveItem(at(from), at(to)), std::nullopt);
+        ASSERT_EQ(_drive.cloud->fileChanges()->moveItem(at(from), at(to)), std::nullopt);
     }
     void remove(const std::string& path)
     {
-        ASSERT_EQ(_drive.cloud->itemChanges()->removeItem(at(path), std::nullopt), std::nullopt);
+        ASSERT_EQ(_drive.cloud->fileChanges()->removeItem(at(path), std::nullopt), std::nullopt);
     }
     void evict(const std::string& path)
     {

@@ -234,7 +234,7 @@ TEST_F(BookmarkMaking, outlivesMovesAndNewNames)
     const auto text = make(document);
     ASSERT_TRUE(text);
     const auto here = _drive.url("Desktop/b.txt"), elsewhere = _drive.url("Desktop/Folder/c.txt");
-    EXPECT_FALSE(_drive.cloud->itemChanges()->moveItem(document.path(), here.path()));
+    EXPECT_FALSE(_drive.cloud->fileChanges()->moveItem(document.path(), here.path()));
     EXPECT_EQ(decode(*text).value, here);
     _drive.makeFolder("Desktop/Folder");
     std::filesystem::rename(here.path(), elsewhere.path());
