@@ -144,7 +144,7 @@ std::optional<Error> FileUtils::moveTo(const Url& source, const Url& destination
 bool FileUtils::evictDocument(const Url& url)
 {
     static constexpr Operation op{"+[FileUtils evictDocument:]"};
-    const auto error = services().cloudDocumentService().items().evictItem(url);
+    const auto error = changes().evictItem(url.path());
     if (error)
         op.warning("Evict error: %@", *error);
     return !error;

@@ -35,14 +35,6 @@ public:
     /// links. Any thread.
     virtual Url realURL(const Url& url) const = 0;
 
-    /// Removes the downloaded copy of a document and keeps the content in the cloud; a promise takes the
-    /// document's place. A document that is only promised already is no error. Errors:
-    /// FileErrorCode::NoSuchItem; FileErrorCode::Unsupported for what is no document;
-    /// FileErrorCode::ItemExists when a promise of another content lies beside it; FileErrorCode::Cancelled
-    /// when the document changes meanwhile; else the system's. The document stays whole after every error.
-    /// Any thread; the call waits for the disk.
-    virtual std::optional<Error> evictItem(const Url& url) = 0;
-
     /// Makes the bookmark string that names a document on the account's other devices; it stays valid when
     /// the document is moved or renamed, because it holds the document's identifier beside its place. The
     /// completion is called once, on any thread. Its error has notBookmarkableCode for what no other device

@@ -296,7 +296,8 @@ TEST_F(FileChangesTest, BadInputIsToldAndChangesNothing)
         {"256 bytes on the way", FileUtils::mkdir(at("new/" + composed + "/x")), 514},
         {"a promise whose file's name is too long", FileUtils::moveTo(promised, at(std::string(250, 'p'))),
             514},
-        {"eviction under such a name", DriveFixture::cloud->items().evictItem(tooLongToEvict), 514},
+        {"eviction under such a name", DriveFixture::cloud->fileChanges()->evictItem(tooLongToEvict.path()),
+            514},
         {"a folder into itself", FileUtils::moveTo(folder, at("folder/in")), EINVAL},
         {"a folder into itself by a link", FileUtils::moveTo(folder, at("link/in")), ENOTDIR},
         {"a file into a link", FileUtils::moveTo(file, at("link/a.txt")), ENOTDIR},
@@ -360,7 +361,7 @@ TEST_F(FileChangesTest, WithoutPermissionAllStaysAsItIs)
         ::chmod(sub.path().c_str(), 0500);
         const std::optional<Error> errors[] = {FileUtils::remove(file), FileUtils::remove(folder),
             FileUtils::moveTo(file, at("a.txt")), FileUtils::mkdir(sub.appendingPathComponent("new")),
-            DriveFixture::cloud->items().evictItem(file)};
+            DriveFixture::cloud->fileChanges()->evictItem(file.path())};
         int wrong = 1;
         for (const auto& error : errors) {
             if (!error || error->code() != EACCES)

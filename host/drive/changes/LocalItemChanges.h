@@ -33,17 +33,13 @@ public:
     std::optional<platform::Error> removeItem(
         const std::string& path, const std::optional<platform::ItemVersion>& unchangedSince) override;
     std::optional<platform::Error> moveItem(const std::string& from, const std::string& to) override;
+    std::optional<platform::Error> evictItem(const std::string& path) override;
     platform::Result<platform::FileContent> contentToReplace(
         const std::string& path, std::size_t maximumBytes) const override;
     platform::Result<platform::ItemVersion> replaceContent(
         const std::string& path, const platform::FileContent& before, std::string_view content) override;
     std::optional<platform::Error> addDocument(
         const std::string& path, const std::string& like, std::string_view content) override;
-
-    /// Hands the content of a downloaded document over to the store and leaves a promise. One that is
-    /// promised already is no error; folders cannot be evicted (FileErrorCode::Unsupported), nor a document
-    /// beside a promise of another content (FileErrorCode::ItemExists).
-    virtual std::optional<platform::Error> evictItem(const std::string& path);
 
 private:
     system::SystemError removeLocated(const LocatedItem& item);

@@ -21,9 +21,9 @@ public:
     std::optional<platform::Error> removeItem(
         const std::string& path, const std::optional<platform::ItemVersion>& unchangedSince) override;
     std::optional<platform::Error> moveItem(const std::string& from, const std::string& to) override;
+    std::optional<platform::Error> evictItem(const std::string& path) override;
     platform::Result<platform::ItemVersion> replaceContent(
         const std::string& path, const platform::FileContent& before, std::string_view content) override;
-    std::optional<platform::Error> evictItem(const std::string& path) override;
 
 private:
     std::shared_ptr<LocalDocumentIdentifiers> _identifiers;

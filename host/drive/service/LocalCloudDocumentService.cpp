@@ -28,8 +28,7 @@ LocalCloudDocumentService::LocalCloudDocumentService(
           ItemAttributes(dependencies.typeRegistry, _containers, dependencies.localization,
               layout.defaultContainerURL()),
           ThumbnailCache::create(settings.thumbnailFolder, dependencies.dispatch), _identifiers)
-    , _items(
-          layout, _itemChanges, _identifiers, _store, dependencies.dispatch, dependencies.notificationCenter)
+    , _items(layout, _identifiers, _store, dependencies.dispatch, dependencies.notificationCenter)
     , _storageOffers(LocalStorageOfferManager::create(layout, dependencies))
     , _keyValueStore(LocalKeyValueStore::create(layout, dependencies))
     , _monitor(AccountMonitor::start(layout, dependencies))

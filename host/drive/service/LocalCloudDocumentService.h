@@ -5,6 +5,7 @@
 
 #include "host/drive/records/DriveDependencies.h"
 #include "host/drive/service/AccountMonitor.h"
+#include "host/drive/service/IndexedItemChanges.h"
 #include "host/drive/service/LocalAccount.h"
 #include "host/drive/service/LocalCloudItems.h"
 #include "host/drive/service/LocalContainers.h"

@@ -70,12 +70,10 @@ Result<Url> findBookmarked(
 
 } // namespace
 
-LocalCloudItems::LocalCloudItems(DriveLayout layout, std::shared_ptr<IndexedItemChanges> changes,
-    std::shared_ptr<LocalDocumentIdentifiers> identifiers, std::shared_ptr<CloudStore> store,
-    const std::shared_ptr<platform::Dispatch>& dispatch,
+LocalCloudItems::LocalCloudItems(DriveLayout layout, std::shared_ptr<LocalDocumentIdentifiers> identifiers,
+    std::shared_ptr<CloudStore> store, const std::shared_ptr<platform::Dispatch>& dispatch,
     std::shared_ptr<platform::NotificationCenter> notifications)
     : _layout(std::move(layout))
-    , _changes(std::move(changes))
     , _identifiers(std::move(identifiers))
     , _downloads(
           std::make_shared<RunningDownloads>(LocalDownload::Setting{_layout, std::move(store),
@@ -101,11 +99,6 @@ Url LocalCloudItems::realURL(const Url& url) const
 {
     const auto real = url.isFileURL() ? realPath(url.path()) : std::nullopt;
     return real && *real != url.path() ? Url::fileURL(*real) : url;
-}
-
-std::optional<Error> LocalCloudItems::evictItem(const Url& url)
-{
-    return _changes->evictItem(url.path());
 }
 
 /// What came has another inode than what was promised.

@@ -3,7 +3,8 @@
 
 #pragma once
 
-#include "host/drive/service/IndexedItemChanges.h"
+#include "host/drive/identity/LocalDocumentIdentifiers.h"
+#include "host/drive/records/DriveLayout.h"
 #include "host/drive/service/RunningDownloads.h"
 #include "platform/CloudItems.h"
 #include "platform/Dispatch.h"
@@ -15,15 +16,13 @@ struct Bookmark;
 /// Where items of the local store lie.
 class LocalCloudItems : public platform::CloudItems {
 public:
-    LocalCloudItems(DriveLayout layout, std::shared_ptr<IndexedItemChanges> changes,
-        std::shared_ptr<LocalDocumentIdentifiers> identifiers, std::shared_ptr<CloudStore> store,
-        const std::shared_ptr<platform::Dispatch>& dispatch,
+    LocalCloudItems(DriveLayout layout, std::shared_ptr<LocalDocumentIdentifiers> identifiers,
+        std::shared_ptr<CloudStore> store, const std::shared_ptr<platform::Dispatch>& dispatch,
         std::shared_ptr<platform::NotificationCenter> notifications);
 
     bool isInDocumentsArea(const platform::Url& url) const override;
     bool isInTrash(const platform::Url& url) const override;
     platform::Url realURL(const platform::Url& url) const override;
-    std::optional<platform::Error> evictItem(const platform::Url& url) override;
     void RZBookmarkableStringFromDocumentURL(const platform::Url& url,
         std::function<void(platform::Result<std::string>)> completion) const override;
     std::unique_ptr<platform::ItemDownload> startDownload(
@@ -40,7 +39,6 @@ private:
     Completion identifying(const platform::Url& url, Completion completion) const;
 
     DriveLayout _layout;
-    std::shared_ptr<IndexedItemChanges> _changes;
     std::shared_ptr<LocalDocumentIdentifiers> _identifiers;
     std::shared_ptr<RunningDownloads> _downloads;
     std::shared_ptr<platform::Queue> _queue;

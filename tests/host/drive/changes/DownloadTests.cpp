@@ -119,7 +119,7 @@ TEST_F(DownloadTest, PutsTheDocumentWithAllThatIsKnownOfItInThePromisesPlace)
     // A document that is already downloaded is no error, and an evicted one can be downloaded again.
     const auto again = start(item);
     dispatch->runUntilIdle();
-    EXPECT_FALSE(cloud->items().evictItem(item));
+    EXPECT_FALSE(cloud->fileChanges()->evictItem(item.path()));
     const auto back = start(item);
     dispatch->runUntilIdle();
     EXPECT_EQ(ended, (std::vector<std::optional<Error>>(3)));

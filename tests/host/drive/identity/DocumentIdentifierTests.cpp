@@ -62,7 +62,7 @@ protected:
     }
     void evict(const std::string& path)
     {
-        ASSERT_EQ(_drive.cloud->items().evictItem(_drive.url(path)), std::nullopt);
+        ASSERT_EQ(_drive.cloud->fileChanges()->evictItem(at(path)), std::nullopt);
     }
     void moveByOthers(const std::string& from, const std::string& to) { fs::rename(at(from), at(to)); }
     /// Copies a file with its attributes, as other programs do.
