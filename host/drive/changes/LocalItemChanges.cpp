@@ -10,6 +10,7 @@
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/ItemFacts.h"
 #include "host/drive/records/SmallFile.h"
+#include "host/system/files/FileVersion.h"
 #include "host/system/files/SystemErrors.h"
 #include "host/system/texts/Translate.h"
 
@@ -32,13 +33,10 @@ namespace {
 PromiseRecord promiseFor(const ItemFacts& facts, const std::string& content)
 {
     PromiseRecord promise;
-    const auto date = [](const statx_timestamp& time) {
-        return platform::Date{time.tv_sec * 1'000'000'000 + time.tv_nsec};
-    };
     promise.size = facts.status.stx_size;
     promise.modified = facts.modified();
     if (facts.status.stx_mask & STATX_BTIME)
-        promise.created = date(facts.status.stx_btime);
+        promise.created = system::dateOf(facts.status.stx_btime);
     promise.shared = facts.marks.shared;
     promise.role = facts.marks.role;
     promise.extensionHidden = facts.marks.extensionHidden;

@@ -9,6 +9,7 @@
 #include "host/drive/records/PromiseRecord.h"
 #include "host/drive/records/SmallFile.h"
 #include "host/system/files/DeepEnumeration.h"
+#include "host/system/files/FileVersion.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -68,7 +69,7 @@ std::optional<Candidate> candidateAt(const std::string& path, const std::string&
         return std::nullopt;
     const bool isBorn = (birth.stx_mask & STATX_BTIME) != 0;
     const auto born = promised ? birthOfPromise(path)
-        : isBorn               ? birth.stx_btime.tv_sec * 1'000'000'000 + birth.stx_btime.tv_nsec
+        : isBorn               ? host::system::nanosecondsOf(birth.stx_btime)
                                : 0;
     return Candidate{{promised.value_or(path).substr(home.size() + 1), status.st_dev, status.st_ino}, born};
 }

@@ -5,6 +5,7 @@
 
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/SmallFile.h"
+#include "host/system/files/FileVersion.h"
 #include "host/system/files/PosixFileSystem.h"
 #include "platform/Log.h"
 
@@ -166,7 +167,7 @@ std::optional<platform::Date> ItemFacts::modified() const
 {
     if (presence == Presence::Promised)
         return promise.modified;
-    return platform::Date{status.stx_mtime.tv_sec * 1'000'000'000 + status.stx_mtime.tv_nsec};
+    return host::system::dateOf(status.stx_mtime);
 }
 
 ItemFacts lookAtItem(const std::string& path)

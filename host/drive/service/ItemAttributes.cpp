@@ -3,6 +3,8 @@
 
 #include "host/drive/service/ItemAttributes.h"
 
+#include "host/system/files/FileVersion.h"
+
 #include <glib.h>
 
 #include <algorithm>
@@ -14,14 +16,8 @@ namespace {
 using platform::AttributeKey;
 using platform::AttributeMap;
 using platform::AttributeValue;
-using platform::Date;
 using platform::DownloadingStatus;
 using platform::Url;
-
-Date dateFrom(const statx_timestamp& time)
-{
-    return {time.tv_sec * 1'000'000'000 + time.tv_nsec};
-}
 
 template <typename T>
 AttributeValue valueOf(const std::optional<T>& value)
@@ -60,7 +56,7 @@ AttributeValue creationDate(const ItemFacts& facts)
         return valueOf(facts.promise.created);
     if (!(facts.status.stx_mask & STATX_BTIME))
         return {};
-    return dateFrom(facts.status.stx_btime);
+    return system::dateOf(facts.status.stx_btime);
 }
 
 AttributeValue downloadingStatus(const ItemFacts& facts)

@@ -5,6 +5,7 @@
 
 #include "host/drive/records/SmallFile.h"
 #include "host/system/files/DirectoryReader.h"
+#include "host/system/files/FileVersion.h"
 #include "platform/Log.h"
 
 #include <fcntl.h>
@@ -163,7 +164,7 @@ LocalContainers::Signature LocalContainers::signature(const std::string& identif
     if (::lstat(_layout.containerDescription(identifier).c_str(), &status) == 0) {
         result.inode = status.st_ino;
         result.size = static_cast<std::uint64_t>(status.st_size);
-        result.modified = status.st_mtim.tv_sec * 1'000'000'000 + status.st_mtim.tv_nsec;
+        result.modified = host::system::nanosecondsOf(status.st_mtim);
     }
     result.hasDocuments =
         ::lstat(_layout.containerDocuments(identifier).c_str(), &status) == 0 && S_ISDIR(status.st_mode);

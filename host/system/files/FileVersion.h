@@ -9,9 +9,18 @@
 
 namespace host::system {
 
-inline std::int64_t nanosecondsOf(const timespec& time)
+/// A time of the kernel, a timespec or a statx_timestamp, in nanoseconds since 1970.
+template <typename Time>
+std::int64_t nanosecondsOf(const Time& time)
 {
-    return time.tv_sec * std::int64_t{1'000'000'000} + time.tv_nsec;
+    return std::int64_t{time.tv_sec} * 1'000'000'000 + time.tv_nsec;
+}
+
+/// The same as a date.
+template <typename Time>
+platform::Date dateOf(const Time& time)
+{
+    return {nanosecondsOf(time)};
 }
 
 /// The state of an item, as the kernel describes it.

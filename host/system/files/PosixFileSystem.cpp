@@ -5,6 +5,7 @@
 
 #include "host/system/files/DeepEnumeration.h"
 #include "host/system/files/DirectoryReader.h"
+#include "host/system/files/FileVersion.h"
 #include "host/system/files/SystemErrors.h"
 
 #include <fcntl.h>
@@ -17,16 +18,10 @@
 
 namespace host::system {
 
-using platform::Date;
 using platform::FileAttributes;
 using platform::FileType;
 
 namespace {
-
-Date date(const statx_timestamp& time)
-{
-    return {time.tv_sec * 1'000'000'000 + time.tv_nsec};
-}
 
 bool isExtensionHidden(const std::string& path)
 {
@@ -54,8 +49,8 @@ platform::Result<FileAttributes> PosixFileSystem::attributesOfItem(const std::st
     attributes.type = fileType(found.stx_mode);
     attributes.size = found.stx_size;
     if (found.stx_mask & STATX_BTIME)
-        attributes.creationDate = date(found.stx_btime);
-    attributes.modificationDate = date(found.stx_mtime);
+        attributes.creationDate = dateOf(found.stx_btime);
+    attributes.modificationDate = dateOf(found.stx_mtime);
     attributes.extensionHidden = isExtensionHidden(path);
     return attributes;
 }

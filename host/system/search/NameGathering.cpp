@@ -4,6 +4,7 @@
 #include "host/system/search/NameGathering.h"
 
 #include "host/system/files/DirectoryReader.h"
+#include "host/system/files/FileVersion.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -21,16 +22,15 @@ namespace {
 
 constexpr std::size_t firstProgress = 20'000; ///< items, read in well under a tenth of a second
 constexpr std::size_t progressGrowth = 4; ///< so that all copies together cost a third of the last one
-constexpr std::int64_t nanoseconds = 1'000'000'000;
 /// The clock of file times moves in steps of up to ten milliseconds: a folder that was modified so shortly
 /// before it was read may change again without a new time.
-constexpr std::int64_t unsettled = nanoseconds / 10;
+constexpr std::int64_t unsettled = 100'000'000; // nanoseconds
 
 std::int64_t now()
 {
     timespec time{};
     ::clock_gettime(CLOCK_REALTIME, &time);
-    return time.tv_sec * nanoseconds + time.tv_nsec;
+    return nanosecondsOf(time);
 }
 
 /// 0 when the folder cannot be looked at.
@@ -39,7 +39,7 @@ std::int64_t modificationTime(const FileDescriptor& folder)
     struct stat status { };
     if (::fstat(folder.get(), &status) != 0)
         return 0;
-    return status.st_mtim.tv_sec * nanoseconds + status.st_mtim.tv_nsec;
+    return nanosecondsOf(status.st_mtim);
 }
 
 } // namespace
