@@ -6,6 +6,7 @@
 #include "host/drive/changes/Discarding.h"
 #include "host/drive/records/PromiseRecord.h"
 #include "host/drive/records/SmallFile.h"
+#include "host/system/files/ItemPaths.h"
 #include "host/system/files/SystemErrors.h"
 #include "platform/Log.h"
 
@@ -71,9 +72,10 @@ SystemResult<HeldItem> HeldItem::take(
     item._originName = name;
     item._path = entry.path;
     item._name = heldName(name);
-    const auto origin = entry.path.substr(0, entry.path.rfind('/') + 1);
-    const auto working = (item._isAside ? layout.held() + '/' : origin) + item._name;
-    auto record = WorkRecord::write(layout, {origin + name, working, copy});
+    const auto origin = system::siblingPath(entry.path, name);
+    const auto working =
+        item._isAside ? layout.held() + '/' + item._name : system::siblingPath(entry.path, item._name);
+    auto record = WorkRecord::write(layout, {origin, working, copy});
     if (!record)
         return record.error;
     item._record.emplace(std::move(*record));

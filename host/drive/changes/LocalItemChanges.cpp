@@ -11,6 +11,7 @@
 #include "host/drive/records/ItemFacts.h"
 #include "host/drive/records/SmallFile.h"
 #include "host/system/files/FileVersion.h"
+#include "host/system/files/ItemPaths.h"
 #include "host/system/files/SystemErrors.h"
 #include "host/system/texts/Translate.h"
 
@@ -210,9 +211,10 @@ SystemError LocalItemChanges::moveAcross(
     if (holdsFolder(*before, target.folder))
         return SystemError(ownFolder, target.path);
     const auto temporary = uniqueName(WorkRecord::temporaryPrefix);
-    const auto folder = target.path.substr(0, target.path.rfind('/') + 1);
-    const auto item = source.entry.path.substr(0, source.entry.path.rfind('/') + 1) + source.name;
-    const auto record = WorkRecord::write(_layout, {item, folder + temporary, folder + newName});
+    const auto item = system::siblingPath(source.entry.path, source.name);
+    const auto working = system::siblingPath(target.path, temporary);
+    const auto copy = system::siblingPath(target.path, newName);
+    const auto record = WorkRecord::write(_layout, {item, working, copy});
     const auto copied = record ? copyTo(source, target, temporary, newName) : record.error;
     if (!copied) {
         static_cast<void>(removeTree(target.folder, temporary));
@@ -221,7 +223,7 @@ SystemError LocalItemChanges::moveAcross(
     // From here on the copy is whole and has its name: the worst that can be is that both are there.
     auto failure = syncFolder(target.folder);
     if (!failure)
-        failure = removeMoved(source, *before, folder + newName);
+        failure = removeMoved(source, *before, copy);
     if (failure)
         withdraw(target, newName, *copied);
     return failure;

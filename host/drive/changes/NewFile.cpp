@@ -3,6 +3,8 @@
 
 #include "host/drive/changes/NewFile.h"
 
+#include "host/system/files/ItemPaths.h"
+
 #include <fcntl.h>
 
 #include <cerrno>
@@ -32,8 +34,7 @@ SystemResult<NewFile> NewFile::create(const DriveLayout& layout, const DriveEntr
 {
     NewFile fresh;
     const auto name = uniqueName(WorkRecord::temporaryPrefix);
-    const auto folder = entry.path.substr(0, entry.path.rfind('/') + 1);
-    auto record = WorkRecord::write(layout, {entry.path, folder + name, {}});
+    auto record = WorkRecord::write(layout, {entry.path, system::siblingPath(entry.path, name), {}});
     if (!record)
         return record.error;
     fresh._record.emplace(std::move(*record));
@@ -73,8 +74,7 @@ SystemError NewFile::publish(const DriveEntry& entry, const std::string& name)
 SystemError NewFile::takeHeldName(const DriveLayout& layout, const DriveEntry& entry)
 {
     auto held = uniqueName(WorkRecord::heldPrefix);
-    const auto folder = entry.path.substr(0, entry.path.rfind('/') + 1);
-    auto record = WorkRecord::write(layout, {entry.path, folder + held, {}});
+    auto record = WorkRecord::write(layout, {entry.path, system::siblingPath(entry.path, held), {}});
     if (!record)
         return record.error;
     TRW_TRY(renameEntry(_folder, _name, _folder, held));

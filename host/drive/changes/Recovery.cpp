@@ -11,6 +11,7 @@
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/SmallFile.h"
 #include "host/system/files/DirectoryReader.h"
+#include "host/system/files/ItemPaths.h"
 #include "host/system/files/SystemErrors.h"
 #include "platform/Log.h"
 
@@ -22,6 +23,7 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::lastName;
 using host::system::SystemError;
 
 namespace {
@@ -32,11 +34,6 @@ constexpr const char* originMark = "user.tarrow.origin";
 bool isThere(const DriveEntry& entry)
 {
     return static_cast<bool>(entry.status());
-}
-
-std::string lastName(const std::string& path)
-{
-    return path.substr(path.rfind('/') + 1);
 }
 
 /// The same private name with another prefix.
@@ -63,7 +60,7 @@ void Recovery::run()
 
 platform::Result<DriveEntry> Recovery::entryAt(const std::string& path) const
 {
-    const auto name = lastName(path);
+    const std::string name(lastName(path));
     if (path != _layout.held() + '/' + name)
         return DriveEntry::open(_layout, path);
     auto folder = openOwnFolder(_layout.held());
@@ -155,7 +152,7 @@ bool Recovery::moveToTrash(const DriveEntry& held, const std::string& item)
     const auto document = PromiseRecord::itemPathFor(lastName(item));
     auto failure = trash ? SystemError(EEXIST) : trash.error;
     for (int number = 1; failure.is(EEXIST) && number < mostOfOneName; ++number) {
-        auto name = document.value_or(lastName(item));
+        auto name = document.value_or(std::string(lastName(item)));
         if (number > 1)
             name += ' ' + std::to_string(number);
         failure = renameEntry(held.folder, held.name, *trash, document ? PromiseRecord::pathFor(name) : name);

@@ -6,6 +6,7 @@
 #include "host/drive/changes/DriveEntry.h"
 #include "host/drive/records/SmallFile.h"
 #include "host/system/files/DirectoryReader.h"
+#include "host/system/files/ItemPaths.h"
 
 #include <fcntl.h>
 
@@ -48,11 +49,6 @@ WorkRecord::Places placesOf(const std::string& text)
         text.substr(second + 1, text.size() - second - 2)};
 }
 
-std::string lastName(const std::string& path)
-{
-    return path.substr(path.rfind('/') + 1);
-}
-
 } // namespace
 
 WorkRecord::WorkRecord(WorkRecord&& other) noexcept
@@ -74,7 +70,7 @@ SystemResult<WorkRecord> WorkRecord::write(const DriveLayout& layout, const Plac
     const auto isFull = [] { return errno == ENOSPC || errno == EDQUOT; };
     const auto text = textOf(places);
     WorkRecord fresh;
-    fresh._path = layout.held() + '/' + lastName(places.working) + std::string(recordSuffix);
+    fresh._path = (layout.held() + '/').append(system::lastName(places.working)).append(recordSuffix);
     fresh._file = FileDescriptor(::open(fresh._path.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0600));
     if (!fresh._file && !isFull())
         return SystemError::last(fresh._path);

@@ -10,6 +10,7 @@
 #include "host/drive/records/SmallFile.h"
 #include "host/system/files/DeepEnumeration.h"
 #include "host/system/files/FileVersion.h"
+#include "host/system/files/ItemPaths.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -123,7 +124,7 @@ DocumentFinder::Finding DocumentFinder::find(
 DocumentFinder::Finding DocumentFinder::findInFolderOf(const IdentifiedPlace& known, Effort effort) const
 {
     const auto path = _layout.home() + '/' + known.place.path;
-    const auto folder = path.substr(0, path.find_last_of('/'));
+    const auto folder = host::system::parentPath(path);
     if (folder != _layout.documents() && !folder.starts_with(_layout.documents() + '/'))
         return {};
     return find(folder, Depth::Folder, known, effort);

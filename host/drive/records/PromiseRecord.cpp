@@ -134,11 +134,9 @@ std::string PromiseRecord::pathFor(std::string_view itemPath)
 
 std::optional<std::string> PromiseRecord::itemPathFor(std::string_view promisePath)
 {
-    const auto nameAt = promisePath.rfind('/') + 1;
-    const auto name = system::itemName(promisePath.substr(nameAt));
-    if (name == promisePath.substr(nameAt))
-        return std::nullopt;
-    return std::string(promisePath.substr(0, nameAt)).append(name);
+    const auto promise = system::lastName(promisePath);
+    const auto name = system::itemName(promise);
+    return name == promise ? std::nullopt : std::optional(system::siblingPath(promisePath, name));
 }
 
 } // namespace host::drive

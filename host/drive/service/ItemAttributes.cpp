@@ -4,6 +4,7 @@
 #include "host/drive/service/ItemAttributes.h"
 
 #include "host/system/files/FileVersion.h"
+#include "host/system/files/ItemPaths.h"
 
 #include <glib.h>
 
@@ -90,7 +91,7 @@ bool standsForAnother(std::string_view extension)
 // The extension as Url::pathExtension() has it, without a copy of the name: this is asked for every row.
 std::string_view extensionOf(const std::string& path)
 {
-    const std::string_view name = std::string_view(path).substr(path.rfind('/') + 1);
+    const std::string_view name = system::lastName(path);
     const auto dot = name.rfind('.');
     if (dot == std::string_view::npos || dot == 0 || name.find(' ', dot) != std::string_view::npos)
         return {};

@@ -3,6 +3,8 @@
 
 #include "host/system/coordination/LockFile.h"
 
+#include "host/system/files/ItemPaths.h"
+
 #include <fcntl.h>
 #include <sys/mman.h>
 #include <sys/stat.h>
@@ -80,7 +82,7 @@ LockFile::LockFile(std::string path)
         _unnamed = FileDescriptor(::memfd_create("coordination", MFD_CLOEXEC));
         _path = "/proc/self/fd/" + std::to_string(_unnamed.get());
     } else {
-        ::mkdir(_path.substr(0, _path.rfind('/')).c_str(), S_IRWXU);
+        ::mkdir(parentPath(_path).c_str(), S_IRWXU);
     }
 }
 

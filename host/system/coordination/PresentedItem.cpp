@@ -52,14 +52,13 @@ std::optional<std::string> PresentedItem::whereabouts() const
     if (length <= 0)
         return std::nullopt;
     const std::string path(buffer.data(), static_cast<std::size_t>(length));
-    const auto nameAt = path.rfind('/') + 1;
-    const auto name = itemName(path.substr(nameAt));
+    const auto name = itemName(lastName(path));
     // What was removed is named too, with a remark at the end that could be part of a name.
     struct stat status;
     if (isPassingName(name) || ::lstat(path.c_str(), &status) != 0 || status.st_dev != _version.device
         || status.st_ino != _version.inode)
         return std::nullopt;
-    return path.substr(0, nameAt) + name;
+    return siblingPath(path, name);
 }
 
 void PresentedItem::forget()

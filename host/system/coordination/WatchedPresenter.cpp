@@ -85,7 +85,7 @@ void WatchedPresenter::link(FolderWatches& watches)
     bool isAtTop = false;
     while (!isAtTop && path != "/") {
         const auto folder = parentPath(path);
-        _links.push_back({hold(watches, folder), path.substr(path.rfind('/') + 1)});
+        _links.push_back({hold(watches, folder), std::string(lastName(path))});
         isAtTop = !isPathWithin(path, _root) || path == _root;
         path = folder;
     }

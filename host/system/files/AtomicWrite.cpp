@@ -3,6 +3,7 @@
 
 #include "host/system/files/AtomicWrite.h"
 
+#include "host/system/files/ItemPaths.h"
 #include "host/system/files/SystemErrors.h"
 
 #include <fcntl.h>
@@ -21,14 +22,7 @@ namespace {
 
 FileDescriptor openParent(const std::string& path)
 {
-    const auto slash = path.rfind('/');
-    const auto parent = slash == std::string::npos ? "." : slash == 0 ? "/" : path.substr(0, slash);
-    return FileDescriptor(::open(parent.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
-}
-
-std::string lastName(const std::string& path)
-{
-    return path.substr(path.rfind('/') + 1);
+    return FileDescriptor(::open(parentPath(path).c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
 }
 
 std::string temporaryName()
@@ -89,7 +83,7 @@ std::optional<Error> writeFileAtomically(const std::string& path, std::string_vi
     const auto folder = openParent(path);
     if (!folder)
         return systemError(errno, path);
-    return writeFileAtomically(folder, lastName(path), content, path);
+    return writeFileAtomically(folder, std::string(lastName(path)), content, path);
 }
 
 std::optional<Error> writeFileAtomically(
@@ -112,7 +106,7 @@ platform::Result<std::string> readWholeFile(const std::string& path, std::size_t
     const auto folder = openParent(path);
     if (!folder)
         return systemError(errno, path);
-    return readWholeFile(folder, lastName(path), maximumBytes, path);
+    return readWholeFile(folder, std::string(lastName(path)), maximumBytes, path);
 }
 
 platform::Result<std::string> readWholeFile(

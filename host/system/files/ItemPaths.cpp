@@ -7,6 +7,8 @@
 
 #include <sys/stat.h>
 
+#include <algorithm>
+
 namespace host::system {
 
 bool isPathWithin(std::string_view path, std::string_view folder)
@@ -15,10 +17,21 @@ bool isPathWithin(std::string_view path, std::string_view folder)
         && (path.size() == folder.size() || folder == "/" || path[folder.size()] == '/');
 }
 
-std::string parentPath(const std::string& path)
+std::string parentPath(std::string_view path)
 {
     const auto slash = path.rfind('/');
-    return slash == 0 ? "/" : path.substr(0, slash);
+    return slash == std::string_view::npos ? "."
+                                           : std::string(path.substr(0, std::max<std::size_t>(slash, 1)));
+}
+
+std::string_view lastName(std::string_view path)
+{
+    return path.substr(path.rfind('/') + 1);
+}
+
+std::string siblingPath(std::string_view path, std::string_view name)
+{
+    return std::string(path.substr(0, path.rfind('/') + 1)).append(name);
 }
 
 std::string promisePath(std::string_view path)

@@ -4,6 +4,7 @@
 #include "host/system/files/JsonFile.h"
 
 #include "host/system/files/AtomicWrite.h"
+#include "host/system/files/ItemPaths.h"
 #include "platform/Log.h"
 
 #include <nlohmann/json.hpp>
@@ -97,8 +98,7 @@ JsonFile::State JsonFile::setAside(std::string_view reason) const
 
 std::optional<platform::Error> JsonFile::write(const json& value) const
 {
-    if (const auto slash = _path.rfind('/'); slash != std::string::npos)
-        g_mkdir_with_parents(_path.substr(0, slash).c_str(), 0700); // the write tells when this failed
+    g_mkdir_with_parents(parentPath(_path).c_str(), 0700); // the write tells when this failed
     return writeFileAtomically(_path, jsonText(value));
 }
 

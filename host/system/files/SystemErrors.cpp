@@ -3,6 +3,8 @@
 
 #include "host/system/files/SystemErrors.h"
 
+#include "host/system/files/ItemPaths.h"
+
 #include "host/system/texts/Translate.h"
 #include "platform/Localization.h"
 
@@ -84,8 +86,8 @@ std::optional<FileErrorCode> fileErrorCode(int errorNumber)
 
 std::string displayName(std::string_view path)
 {
-    if (const auto slash = path.rfind('/'); slash != std::string_view::npos && path.size() > 1)
-        path.remove_prefix(slash + 1);
+    if (path.size() > 1)
+        path = lastName(path);
     const std::unique_ptr<char, decltype(&g_free)> valid(
         g_utf8_make_valid(path.empty() ? "" : path.data(), static_cast<gssize>(path.size())), g_free);
     return valid.get();
