@@ -11,10 +11,8 @@
 #include <fcntl.h>
 #include <signal.h>
 
-#include <atomic>
 #include <cerrno>
 #include <charconv>
-#include <cstdio>
 
 namespace host::drive {
 
@@ -106,13 +104,6 @@ SystemError renameEntry(
     return SystemError::unless(done == 0, name);
 }
 
-SystemError syncFolder(const FileDescriptor& folder)
-{
-    // A descriptor that only names a folder cannot be synced.
-    const FileDescriptor readable(::openat(folder.get(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-    return SystemError::unless(readable && ::fsync(readable.get()) == 0);
-}
-
 SystemResult<FileDescriptor> openOwnFolder(const std::string& path)
 {
     if (::mkdir(path.c_str(), S_IRWXU) != 0 && errno != EEXIST)
@@ -121,17 +112,6 @@ SystemResult<FileDescriptor> openOwnFolder(const std::string& path)
     if (!folder)
         return SystemError::last(path);
     return folder;
-}
-
-std::string uniqueName(const char* prefix)
-{
-    static std::atomic<unsigned> counter = 0;
-    timespec now{};
-    clock_gettime(CLOCK_REALTIME, &now);
-    char name[96];
-    std::snprintf(name, sizeof name, "%s%x-%lx%lx-%x", prefix, static_cast<unsigned>(getpid()),
-        static_cast<unsigned long>(now.tv_sec), static_cast<unsigned long>(now.tv_nsec), counter++);
-    return name;
 }
 
 bool isProcessGone(const std::string& uniqueName)

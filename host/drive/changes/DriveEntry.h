@@ -4,6 +4,7 @@
 #pragma once
 
 #include "host/drive/records/DriveLayout.h"
+#include "host/system/files/AtomicWrite.h"
 #include "host/system/files/FileDescriptor.h"
 #include "host/system/files/FileVersion.h"
 #include "host/system/files/SystemError.h"
@@ -53,6 +54,8 @@ struct LocatedItem {
     bool isPromise() const { return name != entry.name; }
 };
 
+using host::system::syncFolder;
+using host::system::uniqueName;
 using host::system::versionOf;
 /// Whether both are one item of one content; a rename in between changes no more than the time of change.
 bool isSameContent(const platform::ItemVersion& a, const platform::ItemVersion& b);
@@ -63,13 +66,9 @@ host::system::SystemResult<struct stat> statusAt(
 /// Renames without replacing anything (EEXIST).
 host::system::SystemError renameEntry(const host::system::FileDescriptor& from, const std::string& name,
     const host::system::FileDescriptor& to, const std::string& newName);
-/// Brings a folder's names to the disk.
-host::system::SystemError syncFolder(const host::system::FileDescriptor& folder);
 /// Opens a folder of the drive's own, which is made when it is missing and which the user alone may enter.
 host::system::SystemResult<host::system::FileDescriptor> openOwnFolder(const std::string& path);
-/// A name that nothing has yet in any folder: a prefix, the process, the time, a number.
-std::string uniqueName(const char* prefix);
-/// Whether the process that made such a name is known to be gone.
+/// Whether the process that made such a name (see uniqueName()) is known to be gone.
 bool isProcessGone(const std::string& uniqueName);
 
 } // namespace host::drive

@@ -49,13 +49,7 @@ SystemResult<NewFile> NewFile::create(const DriveLayout& layout, const DriveEntr
 
 SystemError NewFile::write(std::string_view text) const
 {
-    while (!text.empty()) {
-        const auto written = ::write(_file.get(), text.data(), text.size());
-        if (written < 0 && errno != EINTR)
-            return SystemError::last(_name);
-        text.remove_prefix(written > 0 ? static_cast<std::size_t>(written) : 0);
-    }
-    return {};
+    return system::writeWhole(_file, text);
 }
 
 SystemError NewFile::publish(const DriveEntry& entry, const std::string& name)

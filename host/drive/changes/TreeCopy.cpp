@@ -6,6 +6,7 @@
 #include "host/drive/changes/DriveEntry.h"
 #include "host/drive/changes/TreeWalk.h"
 #include "host/drive/records/BeneathRoot.h"
+#include "host/system/files/AtomicWrite.h"
 
 #include <fcntl.h>
 #include <sys/xattr.h>
@@ -67,19 +68,6 @@ SystemResult<std::size_t> readPiece(const FileDescriptor& file, Piece& piece)
         filled += length > 0 ? static_cast<std::size_t>(length) : 0;
     }
     return filled;
-}
-
-SystemError writePiece(const FileDescriptor& file, const char* bytes, std::size_t length)
-{
-    while (length > 0) {
-        const auto written = ::write(file.get(), bytes, length);
-        if (written < 0 && errno != EINTR)
-            return SystemError::last();
-        const auto done = written > 0 ? static_cast<std::size_t>(written) : 0;
-        bytes += done;
-        length -= done;
-    }
-    return {};
 }
 
 SystemError copyFile(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
@@ -229,7 +217,7 @@ SystemError copyBytes(const FileDescriptor& from, const FileDescriptor& to,
         const auto length = readPiece(from, *piece);
         if (!length || *length == 0)
             return length.error;
-        TRW_TRY(writePiece(to, piece->data(), *length));
+        TRW_TRY(system::writeWhole(to, {piece->data(), *length}));
         done += *length;
         if (copied)
             TRW_TRY(copied(done));

@@ -5,7 +5,8 @@
 
 #include "host/drive/records/ItemFacts.h"
 #include "host/drive/records/SmallFile.h"
-#include "host/system/files/FileDescriptor.h"
+#include "host/system/files/AtomicWrite.h"
+#include "host/system/files/ItemPaths.h"
 #include "host/system/files/PosixFileSystem.h"
 
 #include <fcntl.h>
@@ -14,7 +15,6 @@
 #include <sys/xattr.h>
 
 #include <cerrno>
-#include <cstdio>
 #include <ctime>
 #include <filesystem>
 #include <memory>
@@ -22,8 +22,6 @@
 namespace host::drive::sample {
 
 namespace {
-
-using host::system::FileDescriptor;
 
 std::int64_t secondsDaysAgo(int days)
 {
@@ -52,17 +50,6 @@ std::string contentName(const std::string& path)
     return std::string(digest.get()).substr(0, 32);
 }
 
-bool writeAll(const FileDescriptor& file, std::string_view content)
-{
-    while (!content.empty()) {
-        const auto count = ::write(file.get(), content.data(), content.size());
-        if (count < 0 && errno != EINTR)
-            return false;
-        content.remove_prefix(count > 0 ? static_cast<std::size_t>(count) : 0);
-    }
-    return true;
-}
-
 } // namespace
 
 bool SampleWriter::fail(int errorNumber, const std::string& path)
@@ -85,29 +72,16 @@ bool SampleWriter::makeFolders(const std::string& absolutePath)
     return error ? fail(error.value(), absolutePath) : !_error;
 }
 
-// Whole or not at all, and never over something else: written under a name of its own, then given its name.
 bool SampleWriter::write(const std::string& absolutePath, std::string_view content)
 {
-    const auto folder = std::filesystem::path(absolutePath).parent_path().string();
-    if (!makeFolders(folder))
+    if (!makeFolders(host::system::parentPath(absolutePath)))
         return false;
-    const auto temporary = folder + "/.tarrow-sample-" + std::to_string(::getpid());
-    {
-        const FileDescriptor file(
-            ::open(temporary.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC, 0600));
-        if (!file || !writeAll(file, content)) {
-            const int failure = errno;
-            ::unlink(temporary.c_str());
-            return fail(failure, absolutePath);
-        }
-    }
-    if (::renameat2(AT_FDCWD, temporary.c_str(), AT_FDCWD, absolutePath.c_str(), RENAME_NOREPLACE) != 0) {
-        const int failure = errno;
-        ::unlink(temporary.c_str());
-        return failure == EEXIST ? false : fail(failure, absolutePath);
-    }
-    ++_written;
-    return true;
+    const auto error = host::system::writeNewFileAtomically(absolutePath, content);
+    if (!error)
+        ++_written;
+    else if (!_error && !error->is(platform::FileErrorCode::ItemExists))
+        _error = error;
+    return !error;
 }
 
 void SampleWriter::decorate(const std::string& absolutePath, const Traits& traits)
@@ -175,7 +149,7 @@ void SampleWriter::link(const std::string& path, const std::string& target)
 {
     if (_error || isTaken(absolute(path)))
         return;
-    if (!makeFolders(std::filesystem::path(absolute(path)).parent_path().string()))
+    if (!makeFolders(host::system::parentPath(absolute(path))))
         return;
     if (::symlink(target.c_str(), absolute(path).c_str()) == 0)
         ++_written;

@@ -25,29 +25,6 @@ FileDescriptor openParent(const std::string& path)
     return FileDescriptor(::open(parentPath(path).c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
 }
 
-std::string temporaryName()
-{
-    static std::atomic<unsigned> counter = 0;
-    timespec now{};
-    clock_gettime(CLOCK_REALTIME, &now);
-    char name[80];
-    std::snprintf(name, sizeof name, ".trwtmp-%x-%lx%lx-%x", static_cast<unsigned>(getpid()),
-        static_cast<unsigned long>(now.tv_sec), static_cast<unsigned long>(now.tv_nsec), counter++);
-    return name;
-}
-
-bool writeWhole(const FileDescriptor& file, std::string_view content)
-{
-    while (!content.empty()) {
-        const auto written = ::write(file.get(), content.data(), content.size());
-        if (written < 0 && errno != EINTR)
-            return false;
-        if (written > 0)
-            content.remove_prefix(static_cast<std::size_t>(written));
-    }
-    return true;
-}
-
 /// The access that the file under the name gives now.
 mode_t modeToKeep(const FileDescriptor& folder, const std::string& name)
 {
@@ -56,24 +33,40 @@ mode_t modeToKeep(const FileDescriptor& folder, const std::string& name)
     return isThere && S_ISREG(found.st_mode) ? found.st_mode & 0777 : S_IRUSR | S_IWUSR;
 }
 
-/// The errno of what failed; 0 when the whole content lies on the disk under the temporary name.
-int writeTemporary(
-    const FileDescriptor& folder, const std::string& name, mode_t mode, std::string_view content)
+enum class Purpose {
+    Replace, ///< a content that must not be lost, in place of what has the name
+    Make, ///< a new file, which can be made again
+};
+
+/// Writes the whole content under the temporary name.
+SystemError writeTemporary(const FileDescriptor& folder, const std::string& name, mode_t mode,
+    std::string_view content, Purpose purpose)
 {
     constexpr int flags = O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC | O_NOFOLLOW;
     const FileDescriptor file(::openat(folder.get(), name.c_str(), flags, S_IRUSR | S_IWUSR));
     if (!file)
-        return errno;
-    const bool isWritten =
-        writeWhole(file, content) && ::fchmod(file.get(), mode) == 0 && ::fsync(file.get()) == 0;
-    return isWritten ? 0 : errno;
+        return SystemError::last(name);
+    TRW_TRY(writeWhole(file, content));
+    const bool isDone =
+        ::fchmod(file.get(), mode) == 0 && (purpose == Purpose::Make || ::fsync(file.get()) == 0);
+    return SystemError::unless(isDone, name);
 }
 
-/// fsync refuses descriptors that only name a folder, so it is opened anew.
-int syncFolder(const FileDescriptor& folder)
+std::optional<Error> write(const FileDescriptor& folder, const std::string& name, std::string_view content,
+    std::string_view path, Purpose purpose)
 {
-    const FileDescriptor readable(::openat(folder.get(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-    return readable && ::fsync(readable.get()) == 0 ? 0 : errno;
+    const unsigned flags = purpose == Purpose::Make ? RENAME_NOREPLACE : 0;
+    const auto temporary = uniqueName(".trwtmp-");
+    auto failure = writeTemporary(folder, temporary, modeToKeep(folder, name), content, purpose);
+    if (!failure && ::renameat2(folder.get(), temporary.c_str(), folder.get(), name.c_str(), flags) != 0)
+        failure = SystemError::last(name);
+    if (failure) {
+        ::unlinkat(folder.get(), temporary.c_str(), 0);
+        return systemError(failure, path);
+    }
+    if (purpose == Purpose::Replace)
+        failure = syncFolder(folder);
+    return failure ? std::optional(systemError(failure, path)) : std::nullopt;
 }
 
 } // namespace
@@ -89,16 +82,44 @@ std::optional<Error> writeFileAtomically(const std::string& path, std::string_vi
 std::optional<Error> writeFileAtomically(
     const FileDescriptor& folder, const std::string& name, std::string_view content, std::string_view path)
 {
-    const auto temporary = temporaryName();
-    int failure = writeTemporary(folder, temporary, modeToKeep(folder, name), content);
-    if (!failure && ::renameat(folder.get(), temporary.c_str(), folder.get(), name.c_str()) != 0)
-        failure = errno;
-    if (failure) {
-        ::unlinkat(folder.get(), temporary.c_str(), 0);
-        return systemError(failure, path);
+    return write(folder, name, content, path, Purpose::Replace);
+}
+
+std::optional<Error> writeNewFileAtomically(const std::string& path, std::string_view content)
+{
+    const auto folder = openParent(path);
+    if (!folder)
+        return systemError(errno, path);
+    return write(folder, std::string(lastName(path)), content, path, Purpose::Make);
+}
+
+SystemError writeWhole(const FileDescriptor& file, std::string_view content)
+{
+    while (!content.empty()) {
+        const auto written = ::write(file.get(), content.data(), content.size());
+        if (written < 0 && errno != EINTR)
+            return SystemError::last();
+        content.remove_prefix(written > 0 ? static_cast<std::size_t>(written) : 0);
     }
-    failure = syncFolder(folder);
-    return failure ? std::optional(systemError(failure, path)) : std::nullopt;
+    return {};
+}
+
+SystemError syncFolder(const FileDescriptor& folder)
+{
+    // fsync refuses descriptors that only name a folder, so it is opened anew.
+    const FileDescriptor readable(::openat(folder.get(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    return SystemError::unless(readable && ::fsync(readable.get()) == 0);
+}
+
+std::string uniqueName(std::string_view prefix)
+{
+    static std::atomic<unsigned> counter = 0;
+    timespec now{};
+    clock_gettime(CLOCK_REALTIME, &now);
+    char name[80];
+    std::snprintf(name, sizeof name, "%x-%lx%lx-%x", static_cast<unsigned>(getpid()),
+        static_cast<unsigned long>(now.tv_sec), static_cast<unsigned long>(now.tv_nsec), counter++);
+    return std::string(prefix).append(name);
 }
 
 platform::Result<std::string> readWholeFile(const std::string& path, std::size_t maximumBytes)
