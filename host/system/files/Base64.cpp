@@ -5,6 +5,7 @@
 
 #include <glib.h>
 
+#include <algorithm>
 #include <cstring>
 #include <memory>
 
@@ -12,22 +13,59 @@ namespace host::system {
 
 using platform::Data;
 
-std::string base64Encoded(const Data& data)
+namespace {
+
+std::string encoded(const void* bytes, std::size_t length)
 {
     const std::unique_ptr<char, decltype(&g_free)> text(
-        g_base64_encode(reinterpret_cast<const guchar*>(data.data()), data.size()), g_free);
+        g_base64_encode(static_cast<const guchar*>(bytes), length), g_free);
     return text.get();
+}
+
+/// A text or bytes; nothing where the text is not what encoded() makes of them.
+template <typename Bytes>
+std::optional<Bytes> decoded(const std::string& text)
+{
+    gsize length = 0;
+    const std::unique_ptr<guchar, decltype(&g_free)> decoded(g_base64_decode(text.c_str(), &length), g_free);
+    Bytes bytes;
+    bytes.resize(length);
+    if (length > 0)
+        std::memcpy(bytes.data(), decoded.get(), length);
+    // GLib's decoder skips what it does not know, so what it made of a damaged text is told by the way back.
+    return encoded(bytes.data(), bytes.size()) == text ? std::optional(std::move(bytes)) : std::nullopt;
+}
+
+} // namespace
+
+std::string base64Encoded(const Data& data)
+{
+    return encoded(data.data(), data.size());
 }
 
 std::optional<Data> base64Decoded(const std::string& text)
 {
-    gsize length = 0;
-    const std::unique_ptr<guchar, decltype(&g_free)> bytes(g_base64_decode(text.c_str(), &length), g_free);
-    Data data(length);
-    if (length > 0)
-        std::memcpy(data.data(), bytes.get(), length);
-    // GLib's decoder skips what it does not know, so what it made of a damaged text is told by the way back.
-    return base64Encoded(data) == text ? std::optional(std::move(data)) : std::nullopt;
+    return decoded<Data>(text);
+}
+
+std::string base64UrlEncoded(std::string_view bytes)
+{
+    auto text = encoded(bytes.data(), bytes.size());
+    std::erase(text, '=');
+    std::ranges::replace(text, '+', '-');
+    std::ranges::replace(text, '/', '_');
+    return text;
+}
+
+std::optional<std::string> base64UrlDecoded(std::string_view text)
+{
+    if (text.find_first_of("+/=") != std::string_view::npos)
+        return std::nullopt;
+    std::string padded(text);
+    padded.append((4 - text.size() % 4) % 4, '=');
+    std::ranges::replace(padded, '-', '+');
+    std::ranges::replace(padded, '_', '/');
+    return decoded<std::string>(padded);
 }
 
 } // namespace host::system
