@@ -27,22 +27,12 @@ namespace {
 
 constexpr std::int64_t nanosecondsPerSecond = 1'000'000'000;
 
-std::string joined(const std::vector<std::string>& tags)
-{
-    std::string text;
-    for (const auto& tag : tags)
-        text.append(text.empty() ? "" : ",").append(tag);
-    return text;
-}
-
 /// What the promise says beside the content becomes the file's own.
 SystemError mark(const FileDescriptor& file, const PromiseRecord& promise)
 {
-    const auto role = !promise.role                        ? ""
-        : *promise.role == platform::SharedItemRole::Owner ? "owner"
-                                                           : "participant";
+    const auto role = !promise.role ? "" : nameOf(*promise.role);
     const auto identifier = promise.documentIdentifier;
-    const std::pair<const char*, std::string> marks[] = {{itemMark::tags, joined(promise.tags)},
+    const std::pair<const char*, std::string> marks[] = {{itemMark::tags, joinedTags(promise.tags)},
         {itemMark::shared, promise.shared ? "1" : ""}, {itemMark::role, role},
         {itemMark::documentIdentifier, identifier != 0 ? std::to_string(identifier) : ""},
         {system::hiddenExtensionAttribute, promise.extensionHidden ? "1" : ""},

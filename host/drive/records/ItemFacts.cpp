@@ -22,7 +22,6 @@ namespace host::drive {
 namespace {
 
 using platform::DownloadingStatus;
-using platform::SharedItemRole;
 
 constexpr std::size_t largestAttribute = 64 * 1024; // the kernel's own limit
 
@@ -57,13 +56,6 @@ std::uint32_t identifier(const std::string& text)
     std::uint32_t value = 0;
     const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), value);
     return error == std::errc() && end == text.data() + text.size() ? value : 0;
-}
-
-std::optional<SharedItemRole> roleNamed(std::string_view name)
-{
-    if (name == "owner")
-        return SharedItemRole::Owner;
-    return name == "participant" ? std::optional(SharedItemRole::Participant) : std::nullopt;
 }
 
 std::optional<DownloadingStatus> statusNamed(std::string_view name)
@@ -137,6 +129,14 @@ void describeFile(ItemFacts& facts, const std::string& path, int failure)
 }
 
 } // namespace
+
+std::string joinedTags(const std::vector<std::string>& tags)
+{
+    std::string text;
+    for (const auto& tag : tags)
+        text.append(text.empty() ? "" : ",").append(tag);
+    return text;
+}
 
 ItemMarks ItemMarks::read(const std::string& path)
 {

@@ -39,6 +39,8 @@ inline constexpr const char* status = "user.tarrow.status"; ///< "downloaded" or
 inline constexpr const char* documentIdentifier = "user.tarrow.document-id"; ///< decimal
 inline constexpr const char* tags = "user.xdg.tags"; ///< names separated by commas
 } // namespace itemMark
+/// Tags as the text of their attribute.
+std::string joinedTags(const std::vector<std::string>& tags);
 
 /// What one look at a logical location found: the item itself, else its promise.
 struct ItemFacts {

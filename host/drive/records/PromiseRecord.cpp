@@ -33,13 +33,6 @@ PromiseRecord::Kind kindNamed(std::string_view name)
                                : PromiseRecord::Kind::File;
 }
 
-std::optional<SharedItemRole> roleNamed(std::string_view name)
-{
-    if (name == "owner")
-        return SharedItemRole::Owner;
-    return name == "participant" ? std::optional(SharedItemRole::Participant) : std::nullopt;
-}
-
 std::vector<std::string> readTags(JsonScanner& scanner)
 {
     std::vector<std::string> tags;
@@ -87,6 +80,18 @@ void readMember(PromiseRecord& record, std::string_view key, JsonScanner& scanne
 
 } // namespace
 
+std::optional<SharedItemRole> roleNamed(std::string_view name)
+{
+    if (name == "owner")
+        return SharedItemRole::Owner;
+    return name == "participant" ? std::optional(SharedItemRole::Participant) : std::nullopt;
+}
+
+const char* nameOf(SharedItemRole role)
+{
+    return role == SharedItemRole::Owner ? "owner" : "participant";
+}
+
 std::optional<PromiseRecord> PromiseRecord::parse(std::string_view text)
 {
     JsonScanner scanner(text);
@@ -115,7 +120,7 @@ std::string PromiseRecord::toJson() const
     if (shared)
         promise["shared"] = true;
     if (role)
-        promise["role"] = *role == SharedItemRole::Owner ? "owner" : "participant";
+        promise["role"] = nameOf(*role);
     if (extensionHidden)
         promise["extensionHidden"] = true;
     if (documentIdentifier != 0)

@@ -14,6 +14,10 @@
 
 namespace host::drive {
 
+/// The names that roles have in promises and in extended attributes: "owner" and "participant".
+std::optional<platform::SharedItemRole> roleNamed(std::string_view name);
+const char* nameOf(platform::SharedItemRole role);
+
 /// What a promise says of the item that it stands for. What it does not say, or says in a way that cannot be
 /// right, is unknown.
 struct PromiseRecord {

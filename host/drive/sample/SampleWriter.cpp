@@ -29,14 +29,6 @@ std::int64_t secondsDaysAgo(int days)
     return std::time(nullptr) - days * 86'400LL - (days * 7919) % 40'000;
 }
 
-std::string joined(const std::vector<std::string>& names)
-{
-    std::string text;
-    for (const auto& name : names)
-        text.append(text.empty() ? "" : ",").append(name);
-    return text;
-}
-
 void setMark(const std::string& path, const char* attribute, const std::string& value)
 {
     // A file system without extended attributes still makes a usable drive.
@@ -88,13 +80,12 @@ void SampleWriter::decorate(const std::string& absolutePath, const Traits& trait
 {
     setMark(absolutePath, itemMark::status, "current");
     if (!traits.tags.empty())
-        setMark(absolutePath, itemMark::tags, joined(traits.tags));
+        setMark(absolutePath, itemMark::tags, joinedTags(traits.tags));
     if (traits.extensionHidden)
         setMark(absolutePath, host::system::hiddenExtensionAttribute, "1");
     if (traits.sharedAs) {
         setMark(absolutePath, itemMark::shared, "1");
-        setMark(absolutePath, itemMark::role,
-            *traits.sharedAs == platform::SharedItemRole::Owner ? "owner" : "participant");
+        setMark(absolutePath, itemMark::role, nameOf(*traits.sharedAs));
     }
     const timespec changed{secondsDaysAgo(traits.daysAgo), 0};
     const timespec times[] = {changed, changed};
