@@ -5,8 +5,7 @@
 
 #include "host/drive/records/DriveDependencies.h"
 #include "host/drive/records/DriveLayout.h"
-#include "host/drive/records/FollowedFolder.h"
-#include "platform/Dispatch.h"
+#include "host/drive/records/FollowedFile.h"
 #include "platform/NotificationCenter.h"
 
 #include <functional>
@@ -28,23 +27,19 @@ public:
     void onFileChanged(std::function<void()> handler) { _fileChanged = std::move(handler); }
 
     /// Reads the file and compares, as if it had changed.
-    void check();
+    void check() { _file->readAgain(); }
 
 private:
     AccountMonitor(const DriveLayout& layout, const DriveDependencies& dependencies);
 
-    void begin();
+    void begin(const DriveDependencies& dependencies);
     void identityRead(std::optional<std::string> identity);
 
     DriveLayout _layout;
-    std::shared_ptr<platform::Dispatch> _dispatch;
     std::shared_ptr<platform::NotificationCenter> _notifications;
-    std::shared_ptr<platform::Queue> _queue;
-    std::shared_ptr<FollowedFolder> _folder;
+    std::shared_ptr<FollowedFile> _file;
     std::function<void()> _fileChanged;
     std::optional<std::string> _identity;
-    bool _checkIsWaiting = false;
-    bool _checkAgain = false; ///< something changed while a check waited
 };
 
 } // namespace host::drive

@@ -79,46 +79,26 @@ std::shared_ptr<LocalKeyValueStore> LocalKeyValueStore::create(
     const DriveLayout& layout, const DriveDependencies& dependencies)
 {
     std::shared_ptr<LocalKeyValueStore> store(new LocalKeyValueStore(layout, dependencies));
-    store->begin();
+    store->begin(dependencies);
     return store;
 }
 
 LocalKeyValueStore::LocalKeyValueStore(const DriveLayout& layout, const DriveDependencies& dependencies)
     : _layout(layout)
-    , _dispatch(dependencies.dispatch)
     , _notifications(dependencies.notificationCenter)
-    , _queue(_dispatch->makeSerialQueue("TarrowDriveAppID.keyvalue"))
 {
 }
 
-void LocalKeyValueStore::begin()
+void LocalKeyValueStore::begin(const DriveDependencies& dependencies)
 {
-    static constexpr platform::Operation op{"-[LocalKeyValueStore begin]"};
-    // The folder is watched rather than the file, so that its creation and its replacement are seen.
-    _folder = FollowedFolder::follow(_dispatch, _layout.home(), FollowedFolder::IfMissing::Wait,
-        weakly(this, [](LocalKeyValueStore& self, const std::vector<std::string>& names) {
-            if (mayHaveChanged(names, DriveLayout::keyValueFileName))
-                self.readAgain();
-        }));
-    if (!_folder->isWatched())
-        op.warning("Cannot watch the key-value store's folder %@", _layout.home());
-}
-
-void LocalKeyValueStore::readAgain()
-{
-    {
-        const std::lock_guard lock(_mutex);
-        if (!_values)
-            return; // What nobody has asked for is not read.
-    }
-    if (_readingWaits->exchange(true))
-        return;
-    _queue->async([weak = weak_from_this(), waits = _readingWaits, path = _layout.keyValueStore(),
-                      main = _dispatch->mainQueue()] {
-        // Before the reading, so that a change during it leads to another one.
-        waits->store(false);
-        main->async(weakly(weak, &LocalKeyValueStore::valuesRead, readValues(path)));
-    });
+    const auto read = [weak = weak_from_this(), path = _layout.keyValueStore(),
+                          isWanted = _isWanted]() -> FollowedFile::Deliver {
+        if (!*isWanted)
+            return [] {};
+        return weakly(weak, &LocalKeyValueStore::valuesRead, readValues(path));
+    };
+    _file = FollowedFile::follow(
+        dependencies.dispatch, _layout.keyValueStore(), "TarrowDriveAppID.keyvalue", read);
 }
 
 void LocalKeyValueStore::valuesRead(PropertyDictionary values)
@@ -135,8 +115,10 @@ void LocalKeyValueStore::valuesRead(PropertyDictionary values)
 std::optional<PropertyValue> LocalKeyValueStore::objectForKey(const std::string& key) const
 {
     const std::lock_guard lock(_mutex);
-    if (!_values)
+    if (!_values) {
+        *_isWanted = true; // before the reading, so that no change falls between the two
         _values = readValues(_layout.keyValueStore());
+    }
     const auto* value = find(*_values, key);
     return value ? std::optional(*value) : std::nullopt;
 }

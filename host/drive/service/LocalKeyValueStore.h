@@ -5,8 +5,7 @@
 
 #include "host/drive/records/DriveDependencies.h"
 #include "host/drive/records/DriveLayout.h"
-#include "host/drive/records/FollowedFolder.h"
-#include "platform/Dispatch.h"
+#include "host/drive/records/FollowedFile.h"
 #include "platform/KeyValueStore.h"
 #include "platform/NotificationCenter.h"
 
@@ -34,16 +33,14 @@ public:
 private:
     LocalKeyValueStore(const DriveLayout& layout, const DriveDependencies& dependencies);
 
-    void begin();
-    void readAgain();
+    void begin(const DriveDependencies& dependencies);
     void valuesRead(platform::PropertyDictionary values);
 
     DriveLayout _layout;
-    std::shared_ptr<platform::Dispatch> _dispatch;
     std::shared_ptr<platform::NotificationCenter> _notifications;
-    std::shared_ptr<platform::Queue> _queue;
-    std::shared_ptr<FollowedFolder> _folder;
-    const std::shared_ptr<std::atomic_bool> _readingWaits = std::make_shared<std::atomic_bool>(false);
+    std::shared_ptr<FollowedFile> _file;
+    /// Whether anybody has asked for a value yet: until then the file is not read.
+    const std::shared_ptr<std::atomic_bool> _isWanted = std::make_shared<std::atomic_bool>(false);
     mutable std::mutex _mutex;
     mutable std::optional<platform::PropertyDictionary> _values; ///< nothing before the first reading
 };
