@@ -6,15 +6,17 @@
 #include "host/drive/records/AccountRecord.h"
 #include "host/drive/records/ContainerRecord.h"
 #include "host/drive/records/LinkRecords.h"
-#include "host/drive/sample/SampleMedia.h"
-#include "host/drive/sample/SamplePages.h"
 #include "host/drive/sample/SamplePictures.h"
 #include "host/drive/sample/SampleTexts.h"
 #include "host/drive/sample/SampleWriter.h"
 
+#include <gio/gio.h>
 #include <nlohmann/json.hpp>
 
 #include <cstdio>
+#include <memory>
+
+extern "C" GResource* trw_sample_get_resource();
 
 namespace host::drive::sample {
 
@@ -33,6 +35,20 @@ constexpr std::pair<const char*, int> tagTable[] = {{"Important", 6}, {"Travel",
 SampleWriter::Content text(const char* content)
 {
     return [content] { return std::string(content); };
+}
+
+/// A file of data/sample, which the program carries.
+SampleWriter::Content file(const char* name)
+{
+    return [path = std::string("/app/tarrow/Drive/sample/") + name] {
+        const std::unique_ptr<GBytes, decltype(&g_bytes_unref)> bytes(
+            g_resource_lookup_data(
+                trw_sample_get_resource(), path.c_str(), G_RESOURCE_LOOKUP_FLAGS_NONE, nullptr),
+            g_bytes_unref);
+        gsize size = 0;
+        const auto* data = static_cast<const char*>(g_bytes_get_data(bytes.get(), &size));
+        return std::string(data, size);
+    };
 }
 
 Traits dated(int daysAgo, std::vector<std::string> tags = {})
@@ -160,14 +176,7 @@ void fillUniversity(const Folder& university)
         "Figures/Figure 1.svg", [] { return chartSvg(); }, dated(12));
     thesis.add(
         "Figures/Figure 2.png", [] { return windowShotPng(); }, dated(11));
-    thesis.promise(
-        "Thesis draft (printed).pdf",
-        [] {
-            return pagesPdf("Shortest paths in changing networks",
-                {{"Introduction", {"Timetables change while travellers are on their way."}},
-                    {"Preliminaries", {"Let G be a directed graph with non-negative weights."}}});
-        },
-        dated(5, {"University"}));
+    thesis.promise("Thesis draft (printed).pdf", file("thesis-draft.pdf"), dated(5, {"University"}));
     const auto algorithms = university.in("Algorithms");
     algorithms.add("quicksort.cpp", text(texts::quicksort), dated(60));
     algorithms.add("tram_map.py", text(texts::graphSearch), dated(52));
@@ -183,16 +192,7 @@ void fillUniversity(const Folder& university)
             algebra.promise(
                 name, [i] { return texts::lecture(i); }, dated(120 - 7 * i, {"University"}));
     }
-    university.add(
-        "Seminar timetable.pdf",
-        [] {
-            return pagesPdf("Seminar timetable",
-                {{"October", {"Mon|10:15|Graphs", "Wed|14:00|Networks", "Thu|09:00|Writing workshop"}},
-                    {"November", {"Mon|10:15|Flows", "Wed|14:00|Routing", "Fri|12:00|Colloquium"}},
-                    {"Rules",
-                        {"- Bring your own examples.", "- Talks last 25 minutes.", "- Cake is welcome."}}});
-        },
-        dated(80, {"University"}));
+    university.add("Seminar timetable.pdf", file("seminar-timetable.pdf"), dated(80, {"University"}));
 }
 
 void fillHousehold(const Folder& household)
@@ -202,20 +202,8 @@ void fillHousehold(const Folder& household)
     recipes.add("Shakshuka.md", text(texts::shakshuka), dated(70, {"Home"}));
     recipes.add("Grandma's plum dumplings.txt", text(texts::plumDumplings), dated(300, {"Family", "Home"}));
     recipes.promise("Quick miso ramen.md", text(texts::ramen), dated(33, {"Home"}));
-    household.add(
-        "Insurance.pdf",
-        [] {
-            return pagesPdf("Household insurance",
-                {{"Policy", {"Holder|Mira Keller", "From|1 March", "Covers|fire, water, theft"}},
-                    {"Contents", {"- bicycle", "- books", "- one very old piano"}}});
-        },
-        dated(400, {"Home", "Archive"}));
-    household.promise(
-        "Rent contract.pdf",
-        [] {
-            return pagesPdf("Rent contract", {{"Flat 4, Garden Lane 12", {"- three rooms", "- balcony"}}});
-        },
-        dated(800, {"Home", "Important"}));
+    household.add("Insurance.pdf", file("insurance.pdf"), dated(400, {"Home", "Archive"}));
+    household.promise("Rent contract.pdf", file("rent-contract.pdf"), dated(800, {"Home", "Important"}));
     household.add("Flat share budget.csv", text(texts::flatBudget), shared(4, SharedItemRole::Owner));
     for (int i = 1; i <= largeFolderCount; ++i)
         household.in("Receipts")
@@ -228,18 +216,8 @@ void fillDocuments(SampleWriter& writer, const Folder& documents)
     fillUniversity(documents.in("University"));
     fillHousehold(documents.in("Household"));
     const auto tickets = documents.in("Tickets");
-    tickets.add(
-        "Night train Berlin – Florence.pdf",
-        [] {
-            return ticketPdf("Berlin – Florence", {"Car 12|Seat 61", "Departure|20:55", "Arrival|11:40"}, 7);
-        },
-        dated(8, {"Travel"}));
-    tickets.promise(
-        "Open-air concert.pdf",
-        [] {
-            return ticketPdf("Open-air concert", {"Row 8|Seat 14", "Doors|18:30"}, 11);
-        },
-        dated(21));
+    tickets.add("Night train Berlin – Florence.pdf", file("night-train.pdf"), dated(8, {"Travel"}));
+    tickets.promise("Open-air concert.pdf", file("open-air-concert.pdf"), dated(21));
     documents.promise(
         "Climbing weekend.md", text(texts::climbingPlan), shared(3, SharedItemRole::Participant));
     documents.add("Reading notes.md", text(texts::readingNotes), Traits{14, {"Ideas", "Someday"}, {}, true});
@@ -285,8 +263,7 @@ void fillPhotos(const Folder& photos)
         "Biscuit the cat.png", [] { return portraitPng(0); }, dated(18, {"Family"}));
     photos.promise(
         "Shadow the cat.png", [] { return portraitPng(1); }, dated(17, {"Family"}));
-    photos.add(
-        "Sunrise.avi", [] { return sunriseAvi(); }, dated(59, {"Travel"}));
+    photos.add("Sunrise.avi", file("sunrise.avi"), dated(59, {"Travel"}));
 }
 
 void fillLibraries(SampleWriter& writer)
@@ -301,10 +278,8 @@ void fillLibraries(SampleWriter& writer)
     sketches.add(
         "Garden/Cat study.png", [] { return portraitPng(2); }, dated(41));
     const Folder recordings(writer, std::string(recorder) + "/Documents");
-    recordings.add(
-        "Morning melody.wav", [] { return tuneWav(0); }, dated(22));
-    recordings.promise(
-        "Rainy evening.wav", [] { return tuneWav(1); }, dated(23, {"Ideas"}));
+    recordings.add("Morning melody.wav", file("morning-melody.wav"), dated(22));
+    recordings.promise("Rainy evening.wav", file("rainy-evening.wav"), dated(23, {"Ideas"}));
 }
 
 } // namespace

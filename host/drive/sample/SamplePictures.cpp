@@ -3,17 +3,35 @@
 
 #include "host/drive/sample/SamplePictures.h"
 
-#include "host/drive/sample/CairoPage.h"
-
+#include <cairo.h>
 #include <gdk-pixbuf/gdk-pixbuf.h>
 
 #include <array>
 #include <cmath>
+#include <memory>
 #include <vector>
 
 namespace host::drive::sample {
 
 namespace {
+
+struct DestroyContext {
+    void operator()(cairo_t* context) const { cairo_destroy(context); }
+};
+struct DestroySurface {
+    void operator()(cairo_surface_t* surface) const { cairo_surface_destroy(surface); }
+};
+using Context = std::unique_ptr<cairo_t, DestroyContext>;
+using Surface = std::unique_ptr<cairo_surface_t, DestroySurface>;
+
+struct Ink {
+    double red, green, blue;
+};
+
+void setInk(cairo_t* context, Ink ink, double alpha = 1)
+{
+    cairo_set_source_rgba(context, ink.red, ink.green, ink.blue, alpha);
+}
 
 struct Palette {
     Ink skyTop, skyBottom, sun, far, near, ground;
@@ -285,30 +303,6 @@ std::string sketchSvg(int variant)
         svg += "\" opacity=\"" + std::to_string(1 - ring * .12) + "\"/>\n";
     }
     return svg + "</g>\n</svg>\n";
-}
-
-std::string sunriseFrameJpeg(int width, int height, double progress)
-{
-    const Picture picture(width, height);
-    cairo_t* context = picture.context.get();
-    const auto mix = [progress](Ink a, Ink b) {
-        return Ink{a.red + (b.red - a.red) * progress, a.green + (b.green - a.green) * progress,
-            a.blue + (b.blue - a.blue) * progress};
-    };
-    const Palette& night = palettes[5];
-    const Palette& day = palettes[0];
-    const Palette now{mix(night.skyTop, day.skyTop), mix({.75, .40, .30}, day.skyBottom), {1, .90, .55},
-        mix(night.far, day.far), mix(night.near, day.near), mix(night.ground, day.ground)};
-    fillSky(context, now, width, height);
-    setInk(context, now.sun, .3);
-    fillCircle(context, width * .5, height * (.85 - .6 * progress), height * .16);
-    setInk(context, now.sun);
-    fillCircle(context, width * .5, height * (.85 - .6 * progress), height * .1);
-    setInk(context, now.far);
-    fillHills(context, width, height, .66, .06, 2);
-    setInk(context, now.ground);
-    fillHills(context, width, height, .82, .04, 7);
-    return picture.jpeg();
 }
 
 } // namespace host::drive::sample

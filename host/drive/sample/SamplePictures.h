@@ -14,7 +14,4 @@ std::string windowShotPng(); ///< a picture of a screen
 std::string chartSvg();
 std::string sketchSvg(int variant);
 
-/// One frame of a sunrise, as JPEG; `progress` runs from 0 to 1.
-std::string sunriseFrameJpeg(int width, int height, double progress);
-
 } // namespace host::drive::sample
