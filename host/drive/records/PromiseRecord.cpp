@@ -3,7 +3,6 @@
 
 #include "host/drive/records/PromiseRecord.h"
 
-#include "host/drive/records/JsonScanner.h"
 #include "host/system/files/ItemPaths.h"
 
 #include <nlohmann/json.hpp>
@@ -12,18 +11,13 @@ namespace host::drive {
 
 namespace {
 
+using nlohmann::json;
 using platform::Date;
 using platform::SharedItemRole;
 
-// Nanoseconds in 64 bits reach from 1677 to 2262; a year beyond does not fit and is unknown.
-std::optional<Date> date(std::optional<std::int64_t> nanoseconds)
+std::optional<std::uint64_t> plausibleSize(std::int64_t size)
 {
-    return nanoseconds ? std::optional(Date{*nanoseconds}) : std::nullopt;
-}
-
-std::optional<std::uint64_t> plausibleSize(std::optional<std::int64_t> size)
-{
-    return size && *size >= 0 ? std::optional(static_cast<std::uint64_t>(*size)) : std::nullopt;
+    return size >= 0 ? std::optional(static_cast<std::uint64_t>(size)) : std::nullopt;
 }
 
 PromiseRecord::Kind kindNamed(std::string_view name)
@@ -33,50 +27,91 @@ PromiseRecord::Kind kindNamed(std::string_view name)
                                : PromiseRecord::Kind::File;
 }
 
-std::vector<std::string> readTags(JsonScanner& scanner)
-{
-    std::vector<std::string> tags;
-    if (scanner.peek() != '[') {
-        scanner.skip();
-        return tags;
-    }
-    scanner.beginArray();
-    while (scanner.nextElement()) {
-        if (auto tag = scanner.text(); tag && !tag->empty())
-            tags.push_back(std::move(*tag));
-    }
-    return tags;
-}
+/// Takes a promise's members as the library's parser meets them: reading a promise is part of showing a row,
+/// and a tree of the JSON would cost more than the rest of it.
+class PromiseReader : public nlohmann::json_sax<json> {
+public:
+    PromiseRecord record;
 
-void readMember(PromiseRecord& record, std::string_view key, JsonScanner& scanner)
-{
-    if (key == "size")
-        record.size = plausibleSize(scanner.integer());
-    else if (key == "created")
-        record.created = date(scanner.integer());
-    else if (key == "modified")
-        record.modified = date(scanner.integer());
-    else if (key == "kind")
-        record.kind = kindNamed(scanner.text().value_or(""));
-    else if (key == "type")
-        record.type = scanner.text().value_or("");
-    else if (key == "shared")
-        record.shared = scanner.boolean().value_or(false);
-    else if (key == "role")
-        record.role = roleNamed(scanner.text().value_or(""));
-    else if (key == "extensionHidden")
-        record.extensionHidden = scanner.boolean().value_or(false);
-    else if (key == "documentIdentifier") {
-        const auto identifier = scanner.integer().value_or(0);
-        record.documentIdentifier =
-            identifier > 0 && identifier <= UINT32_MAX ? static_cast<std::uint32_t>(identifier) : 0;
-    } else if (key == "tags")
-        record.tags = readTags(scanner);
-    else if (key == "content")
-        record.content = scanner.text().value_or("");
-    else
-        scanner.skip();
-}
+    bool null() override { return isInside(); }
+    bool boolean(bool value) override
+    {
+        if (isMember("shared"))
+            record.shared = value;
+        else if (isMember("extensionHidden"))
+            record.extensionHidden = value;
+        return isInside();
+    }
+    bool number_integer(std::int64_t value) override
+    {
+        if (isMember("size"))
+            record.size = plausibleSize(value);
+        else if (isMember("created"))
+            record.created = Date{value};
+        else if (isMember("modified"))
+            record.modified = Date{value};
+        else if (isMember("documentIdentifier") && value > 0 && value <= UINT32_MAX)
+            record.documentIdentifier = static_cast<std::uint32_t>(value);
+        return isInside();
+    }
+    bool number_unsigned(std::uint64_t value) override
+    {
+        return value > INT64_MAX ? isInside() : number_integer(static_cast<std::int64_t>(value));
+    }
+    /// What is too large for an integer comes here as well. Nanoseconds in 64 bits reach from 1677 to 2262: a
+    /// year beyond is unknown.
+    bool number_float(double, const std::string&) override { return isInside(); }
+    bool string(std::string& value) override
+    {
+        // A NUL would cut the text short wherever it is handed to the system.
+        if (!isInside() || value.find('\0') != std::string::npos)
+            return false;
+        if (isMember("kind"))
+            record.kind = kindNamed(value);
+        else if (isMember("type"))
+            record.type = std::move(value);
+        else if (isMember("role"))
+            record.role = roleNamed(value);
+        else if (isMember("content"))
+            record.content = std::move(value);
+        else if (_isInTags && _depth == 2 && !value.empty())
+            record.tags.push_back(std::move(value));
+        return true;
+    }
+    bool binary(binary_t&) override { return false; }
+    bool key(std::string& name) override
+    {
+        if (_depth == 1)
+            _key = std::move(name);
+        return true;
+    }
+    bool start_object(std::size_t) override { return ++_depth <= maximumDepth; }
+    bool end_object() override { return --_depth >= 0; }
+    bool start_array(std::size_t) override
+    {
+        _isInTags = _isInTags || isMember("tags");
+        return isInside() && ++_depth <= maximumDepth;
+    }
+    bool end_array() override
+    {
+        _isInTags = --_depth > 1 && _isInTags;
+        return true;
+    }
+    bool parse_error(std::size_t, const std::string&, const nlohmann::detail::exception&) override
+    {
+        return false;
+    }
+
+private:
+    static constexpr int maximumDepth = 32; ///< objects and arrays within each other
+
+    bool isInside() const { return _depth > 0; }
+    bool isMember(std::string_view name) const { return _depth == 1 && _key == name; }
+
+    std::string _key;
+    int _depth = 0;
+    bool _isInTags = false;
+};
 
 } // namespace
 
@@ -94,21 +129,17 @@ const char* nameOf(SharedItemRole role)
 
 std::optional<PromiseRecord> PromiseRecord::parse(std::string_view text)
 {
-    JsonScanner scanner(text);
-    PromiseRecord record;
-    if (!scanner.beginObject())
-        return std::nullopt;
-    while (const auto key = scanner.nextMember())
-        readMember(record, *key, scanner);
-    if (scanner.failed() || !scanner.atEnd())
-        return std::nullopt;
-    return record;
+    PromiseReader reader;
+    // The parser takes a NUL for the end of the text, whatever follows it.
+    const bool isWhole =
+        text.find('\0') == std::string_view::npos && json::sax_parse(text.begin(), text.end(), &reader);
+    return isWhole ? std::optional(std::move(reader.record)) : std::nullopt;
 }
 
 std::string PromiseRecord::toJson() const
 {
     static constexpr const char* kinds[] = {"file", "directory", "package"};
-    nlohmann::json promise{{"version", 1}, {"kind", kinds[static_cast<int>(kind)]}};
+    json promise{{"version", 1}, {"kind", kinds[static_cast<int>(kind)]}};
     if (size)
         promise["size"] = *size;
     if (created)
@@ -129,7 +160,7 @@ std::string PromiseRecord::toJson() const
         promise["tags"] = tags;
     if (!content.empty())
         promise["content"] = content;
-    return promise.dump(-1, ' ', false, nlohmann::json::error_handler_t::replace) + '\n';
+    return promise.dump(-1, ' ', false, json::error_handler_t::replace) + '\n';
 }
 
 std::string PromiseRecord::pathFor(std::string_view itemPath)

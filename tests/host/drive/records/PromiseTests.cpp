@@ -74,13 +74,13 @@ TEST(PromiseRecordTests, onlyOneWholeObjectIsARecord)
     for (std::size_t length = 0; length < json.size(); ++length)
         EXPECT_FALSE(PromiseRecord::parse(json.substr(0, length))) << length;
     const std::string deep(host::drive::PromiseRecord::maximumFileSize / 2, '[');
-    for (const std::string& text :
-        {json + "x", json + json, std::string("[]"), std::string("null"), std::string("{\"size\" 1}"),
-            std::string("{\"size\":1,}"), std::string("{,}"), std::string("{1:2}"), std::string("{\"a\":01}"),
-            std::string("{\"a\":1.}"), std::string("{\"a\":tru}"), std::string("{\"tags\":[1,]}"),
-            std::string("{\"a\":\"\\ud800\"}"), std::string("{\"a\":\"\\u0000\"}"),
-            std::string("{\"a\":\"\\x\"}"), std::string("{\"a\":\"\xff\"}"), std::string("{\"a\":\"\n\"}"),
-            "{\"a\":" + deep, "{\"tags\":" + deep})
+    for (const std::string& text : {json + "x", json + json, std::string("[]"), std::string("null"),
+             std::string("{\"size\" 1}"), std::string("{\"size\":1,}"), std::string("{,}"),
+             std::string("{1:2}"), std::string("{\"a\":01}"), std::string("{\"a\":1.}"),
+             std::string("{\"a\":1e400}"), std::string("{\"a\":tru}"), std::string("{\"tags\":[1,]}"),
+             std::string("{\"a\":\"\\ud800\"}"), std::string("{\"a\":\"\\u0000\"}"),
+             std::string("{\"a\":\"\\x\"}"), std::string("{\"a\":\"\xff\"}"), std::string("{\"a\":\"\n\"}"),
+             "{\"a\":" + deep, "{\"tags\":" + deep})
         EXPECT_FALSE(PromiseRecord::parse(text)) << text.substr(0, 60);
 }
 
@@ -100,7 +100,7 @@ TEST(PromiseRecordTests, aChangedByteNeverYieldsMoreThanARecord)
 
 TEST(PromiseRecordTests, aFieldThatCannotBeRightIsUnknown)
 {
-    for (const char* size : {"-1", "1e400", "2.5", "99999999999999999999", "\"12\"", "null", "[1,[2]]"}) {
+    for (const char* size : {"-1", "2.5", "99999999999999999999", "\"12\"", "null", "[1,[2]]"}) {
         const auto record =
             PromiseRecord::parse(std::string("{\"size\":") + size + ",\"modified\":" + size + "}");
         ASSERT_TRUE(record) << size;
