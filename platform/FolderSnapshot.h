@@ -24,6 +24,12 @@ enum class FolderEntryKind : std::uint8_t {
     Link, ///< a symbolic link, which is not followed
 };
 
+/// Whether an item of the kind shows what it holds when it is opened: a folder or a library.
+constexpr bool opensAsFolder(FolderEntryKind kind)
+{
+    return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
+}
+
 /// One item of a folder as its list needs it: what is known without touching the item itself.
 struct FolderEntry {
     /// The logical name, as the bytes that the file system has, valid UTF-8 or not. It lives as long as the

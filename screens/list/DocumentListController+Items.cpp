@@ -38,11 +38,6 @@ constexpr ActionEntry menuEntries[] = {
     {DocumentListAction::Delete, "Delete", kit::MenuActionStyle::Destructive, true},
 };
 
-bool opensAsFolder(FolderEntryKind kind)
-{
-    return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
-}
-
 } // namespace
 
 std::size_t DocumentListController::containedItemCount() const

@@ -23,11 +23,6 @@ constexpr const char* folderIcon = "folder";
 constexpr const char* plainDocumentIcon = "text-x-generic";
 constexpr const char* linkIcon = "emblem-symbolic-link";
 
-bool opensAsFolder(FolderEntryKind kind)
-{
-    return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
-}
-
 std::string spokenDescription(
     const kit::ListRow& row, const std::string& kind, const std::vector<std::string>& tagNames)
 {

@@ -42,16 +42,11 @@ std::optional<std::int64_t> numberOfItems(const Url& folder)
     return error ? std::nullopt : std::optional(count);
 }
 
-bool isContainer(FolderEntryKind kind)
-{
-    return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
-}
-
 std::string sizeText(const Url& url, FolderEntryKind kind, const AttributeMap& values)
 {
     if (kind == FolderEntryKind::Link)
         return localized("Link");
-    if (isContainer(kind)) {
+    if (opensAsFolder(kind)) {
         const auto count = numberOfItems(url);
         return count ? localizedPlural(".DICT.ITEMS.%d", {*count}) : std::string();
     }
@@ -80,7 +75,7 @@ void describe(RowDetails& details, const Url& url, FolderEntryKind kind, const A
 RowDetails readRowDetails(const Url& url, FolderEntryKind kind)
 {
     RowDetails details;
-    details.isContainer = isContainer(kind);
+    details.isContainer = opensAsFolder(kind);
     services().fileCoordinator().coordinateReading(
         url, ReadingOptions::ImmediatelyAvailableMetadataOnly, [&](const Url& location) {
             auto reading = promisedItems().readItem(location, detailKeys);

@@ -24,11 +24,6 @@ namespace {
 /// An unknown key sorts before every known one.
 constexpr std::int64_t unknown = std::numeric_limits<std::int64_t>::min();
 
-bool isFolder(FolderEntryKind kind)
-{
-    return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
-}
-
 std::int64_t sizeOf(std::uint64_t bytes)
 {
     constexpr auto most = static_cast<std::uint64_t>(std::numeric_limits<std::int64_t>::max());
@@ -60,7 +55,7 @@ std::int64_t lookAt(const FolderSnapshot& snapshot, std::size_t index, OrderKey 
         return unknown;
     if (key == OrderKey::Date)
         return attributes->modificationDate.nanoseconds;
-    return isFolder(entry.kind) ? unknown : sizeOf(attributes->size);
+    return opensAsFolder(entry.kind) ? unknown : sizeOf(attributes->size);
 }
 
 } // namespace
@@ -93,14 +88,14 @@ private:
     // Kinds without a name of their own come first: folders, then links.
     static std::string keyFor(const FolderEntry& entry)
     {
-        if (isFolder(entry.kind))
+        if (opensAsFolder(entry.kind))
             return "\x01";
         return entry.kind == FolderEntryKind::Link ? "\x02" : std::string(nameExtension(entry.name));
     }
     static std::string nameOf(const FolderEntry& entry)
     {
         const auto key = keyFor(entry);
-        if (isFolder(entry.kind) || entry.kind == FolderEntryKind::Link)
+        if (opensAsFolder(entry.kind) || entry.kind == FolderEntryKind::Link)
             return key;
         const auto& types = services().typeRegistry();
         const auto type = types.typeForExtension(key);
@@ -136,8 +131,8 @@ std::optional<std::int64_t> SnapshotOrder::keyOf(const FolderSnapshot& snapshot,
 bool SnapshotOrder::isBefore(const FolderSnapshot& snapshot, std::uint32_t a, std::uint32_t b) const
 {
     if (_order.grouping == FolderGrouping::FoldersFirst) {
-        const bool isFirst = isFolder(snapshot.kind(a));
-        if (isFirst != isFolder(snapshot.kind(b)))
+        const bool isFirst = opensAsFolder(snapshot.kind(a));
+        if (isFirst != opensAsFolder(snapshot.kind(b)))
             return isFirst;
     }
     const bool descends = _order.direction == OrderDirection::Descending;

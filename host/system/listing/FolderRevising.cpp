@@ -28,11 +28,6 @@ struct Look {
     FolderEntryKind kind = FolderEntryKind::Document;
 };
 
-bool isFolder(FolderEntryKind kind)
-{
-    return kind == FolderEntryKind::Folder || kind == FolderEntryKind::Library;
-}
-
 class Revising {
 public:
     Revising(const ListingTools& tools, FolderGrouping grouping, const FolderSnapshot& before)
@@ -120,7 +115,8 @@ void Revising::findInListBefore()
 
 void Revising::place(std::uint32_t index, const FolderEntry& entry, Look& look)
 {
-    const bool keepsGroup = _grouping == FolderGrouping::Mixed || isFolder(entry.kind) == isFolder(look.kind);
+    const bool keepsGroup =
+        _grouping == FolderGrouping::Mixed || opensAsFolder(entry.kind) == opensAsFolder(look.kind);
     look.isPlaced = look.isThere && keepsGroup;
     if (look.isPlaced)
         _stayed.emplace_back(index, look);

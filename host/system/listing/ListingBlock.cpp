@@ -44,7 +44,7 @@ FolderEntry ListingBlock::entry(std::size_t number) const
 void ListingBlock::appendKey(const FolderEntry& entry, const NameOrder& order,
     platform::FolderGrouping grouping, std::vector<std::uint8_t>& keys)
 {
-    const bool isFolder = entry.kind == FolderEntryKind::Folder || entry.kind == FolderEntryKind::Library;
+    const bool isFolder = platform::opensAsFolder(entry.kind);
     // What is grouped comes first, whatever its name.
     keys.push_back(isFolder && grouping == platform::FolderGrouping::FoldersFirst ? 0 : 1);
     order.appendKey(entry.name, keys);
