@@ -28,6 +28,15 @@ Button::Button(std::string title, std::function<void()> action)
 {
 }
 
+std::shared_ptr<Button> Button::withSymbol(
+    const char* icon, const std::string& label, std::function<void()> action)
+{
+    auto button = std::make_shared<Button>(std::string(), std::move(action));
+    button->setImage(Image::named(icon));
+    button->setAccessibilityLabel(label);
+    return button;
+}
+
 void Button::accept(ViewVisitor& visitor)
 {
     visitor.visit(*this);

@@ -25,15 +25,6 @@ namespace {
 constexpr auto typingPause = std::chrono::milliseconds(150);
 constexpr double margin = 6, buttonSide = 44, countWidth = 76;
 
-std::shared_ptr<kit::Button> symbolButton(
-    const char* icon, const std::string& label, std::function<void()> action)
-{
-    const auto button = std::make_shared<kit::Button>(std::string(), std::move(action));
-    button->setImage(Image::named(icon));
-    button->setAccessibilityLabel(label);
-    return button;
-}
-
 } // namespace
 
 std::shared_ptr<PreviewSearchBar> PreviewSearchBar::create()
@@ -58,11 +49,11 @@ void PreviewSearchBar::build()
     _count = std::make_shared<kit::Label>();
     _count->setFont(kit::Font::preferred(kit::TextStyle::Footnote));
     _count->setAlignment(kit::TextAlignment::Center);
-    _previous = symbolButton("go-up-symbolic", localized("Previous match"),
+    _previous = kit::Button::withSymbol("go-up-symbolic", localized("Previous match"),
         weakly(this, &PreviewSearchBar::showMatch, MatchStep::Previous));
-    _next = symbolButton("go-down-symbolic", localized("Next match"),
+    _next = kit::Button::withSymbol("go-down-symbolic", localized("Next match"),
         weakly(this, &PreviewSearchBar::showMatch, MatchStep::Next));
-    _close = symbolButton(
+    _close = kit::Button::withSymbol(
         "window-close-symbolic", localized("End search"), weakly(this, [](PreviewSearchBar& self) {
             if (const auto call = self._onClose)
                 call();

@@ -12,18 +12,6 @@
 
 namespace screens {
 
-namespace {
-
-std::shared_ptr<kit::Button> symbolButton(const char* icon, const std::string& label)
-{
-    const auto button = std::make_shared<kit::Button>();
-    button->setImage(Image::named(icon));
-    button->setAccessibilityLabel(label);
-    return button;
-}
-
-} // namespace
-
 std::shared_ptr<PreviewToolbar> PreviewToolbar::create()
 {
     const auto bar = std::make_shared<PreviewToolbar>();
@@ -33,11 +21,11 @@ std::shared_ptr<PreviewToolbar> PreviewToolbar::create()
 
 void PreviewToolbar::build()
 {
-    _find = symbolButton("system-search-symbolic", localized("Search in document"));
-    _copy = symbolButton("edit-copy-symbolic", localized("Copy"));
-    _edit = symbolButton("document-edit-symbolic", localized("Edit document"));
-    _zoomOut = symbolButton("zoom-out-symbolic", localized("Smaller"));
-    _zoomIn = symbolButton("zoom-in-symbolic", localized("Larger"));
+    _find = kit::Button::withSymbol("system-search-symbolic", localized("Search in document"));
+    _copy = kit::Button::withSymbol("edit-copy-symbolic", localized("Copy"));
+    _edit = kit::Button::withSymbol("document-edit-symbolic", localized("Edit document"));
+    _zoomOut = kit::Button::withSymbol("zoom-out-symbolic", localized("Smaller"));
+    _zoomIn = kit::Button::withSymbol("zoom-in-symbolic", localized("Larger"));
     _page = std::make_shared<kit::Label>();
     _page->setFont(kit::Font::preferred(kit::TextStyle::Footnote));
     _page->setAlignment(kit::TextAlignment::Center);
