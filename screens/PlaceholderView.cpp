@@ -5,11 +5,13 @@
 
 #include "kit/values/StandardColors.h"
 #include "kit/views/ActivityIndicator.h"
+#include "kit/views/Button.h"
 #include "kit/views/ImageView.h"
 #include "kit/views/Label.h"
 #include "kit/views/StackView.h"
 #include "screens/PlatformNames.h"
 
+#include <algorithm>
 #include <initializer_list>
 
 namespace screens {
@@ -18,6 +20,7 @@ namespace {
 
 constexpr double margin = 24;
 constexpr double lineSpacing = 12;
+constexpr double buttonHeight = 48, buttonWidth = 200;
 /// A plain symbol is pale because the words carry the message. An icon in colour is what the screen is about
 /// and is not pale.
 constexpr double symbolAlpha = 0.5;
@@ -38,6 +41,16 @@ void show(kit::Label& label, const std::string& text)
     label.setHidden(text.empty());
 }
 
+std::shared_ptr<kit::View> rounded(const Color& color)
+{
+    const auto view = std::make_shared<kit::View>();
+    kit::ViewStyle style;
+    style.background = color;
+    style.cornerRadius = PlaceholderView::barHeight / 2;
+    view->setStyle(style);
+    return view;
+}
+
 } // namespace
 
 std::shared_ptr<PlaceholderView> PlaceholderView::create()
@@ -56,9 +69,12 @@ void PlaceholderView::build()
     _title = makeLabel(kit::Font::preferred(kit::TextStyle::Title2).bold());
     _message = makeLabel(kit::Font::preferred(kit::TextStyle::Body));
     _message->setTextColor(kit::StandardColors::gray);
+    _bar = rounded(kit::StandardColors::hairline);
+    _filled = rounded(kit::StandardColors::tint);
+    _bar->addSubview(_filled);
     _stack = std::make_shared<kit::StackView>(kit::Axis::Vertical);
     for (const auto& part :
-        std::initializer_list<std::shared_ptr<kit::View>>{_spinner, _icon, _title, _message})
+        std::initializer_list<std::shared_ptr<kit::View>>{_spinner, _icon, _title, _message, _bar})
         _stack->addArrangedSubview(part);
     _stack->setStackAlignment(kit::StackAlignment::Center);
     _stack->setSpacing(lineSpacing);
@@ -71,6 +87,8 @@ void PlaceholderView::build()
         _stack->widthAnchor().lessThanOrEqualToConstant(maximumWidth),
         _icon->widthAnchor().equalToConstant(iconSide),
         _icon->heightAnchor().equalToConstant(iconSide),
+        _bar->widthAnchor().equalToConstant(barWidth),
+        _bar->heightAnchor().equalToConstant(barHeight),
     });
     setContent({});
 }
@@ -83,12 +101,38 @@ void PlaceholderView::setContent(const Content& content)
         _spinner->startAnimating();
     else
         _spinner->stopAnimating();
-    const bool hasIcon = !content.isBusy && !content.iconName.empty();
+    const bool hasIcon = !content.iconName.empty();
     _icon->setHidden(!hasIcon);
     _icon->setImage(hasIcon ? std::optional(Image::named(content.iconName)) : std::nullopt);
     _icon->setAlpha(content.iconName.ends_with("-symbolic") ? symbolAlpha : 1);
     show(*_title, content.title);
     show(*_message, content.message);
+    showProgress();
+    setNeedsLayout();
+}
+
+void PlaceholderView::showProgress()
+{
+    _bar->setHidden(!_content.progress);
+    const double done = std::clamp(_content.progress.value_or(0), 0.0, 1.0) * barWidth;
+    const bool fromRight = traits().layoutDirection == kit::LayoutDirection::RightToLeft;
+    _filled->setFrame({fromRight ? barWidth - done : 0, 0, done, barHeight});
+}
+
+void PlaceholderView::setActions(const std::vector<Action>& actions)
+{
+    for (const auto& button : _buttons)
+        button->removeFromSuperview();
+    _buttons.clear();
+    for (const auto& action : actions) {
+        const auto button = std::make_shared<kit::Button>(action.title, action.run);
+        if (action.isSuggested)
+            button->setButtonStyle(kit::ButtonStyle::Suggested);
+        _buttons.push_back(button);
+        _stack->addArrangedSubview(button);
+        kit::LayoutConstraint::activate({button->heightAnchor().equalToConstant(buttonHeight),
+            button->widthAnchor().greaterThanOrEqualToConstant(buttonWidth)});
+    }
     setNeedsLayout();
 }
 

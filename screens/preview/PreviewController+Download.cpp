@@ -8,12 +8,12 @@
 #include "platform/Services.h"
 #include "platform/Weakly.h"
 #include "screens/ErrorWords.h"
+#include "screens/PlaceholderView.h"
 #include "screens/PlatformNames.h"
 #include "screens/preview/PreviewContent.h"
 #include "screens/preview/PreviewController.h"
 #include "screens/preview/PreviewLoader.h"
 #include "screens/preview/PreviewScreenView.h"
-#include "screens/preview/PreviewSummaryView.h"
 
 #include <utility>
 
@@ -56,7 +56,7 @@ void PreviewController::showDownload(const DownloadProgress& progress)
     if (!_download || !_content || !_screen)
         return;
     if (!_summary) {
-        _summary = PreviewSummaryView::create();
+        _summary = PlaceholderView::create();
         _summary->setActions({{localized("Cancel"), weakly(this, &PreviewController::cancelDownload)}});
         _screen->setContent(_summary);
         connectPreview();

@@ -14,12 +14,12 @@
 #include "platform/Services.h"
 #include "platform/Weakly.h"
 #include "screens/DisplayName.h"
+#include "screens/PlaceholderView.h"
 #include "screens/preview/PreviewEditor.h"
 #include "screens/preview/PreviewLoader.h"
 #include "screens/preview/PreviewPictureView.h"
 #include "screens/preview/PreviewScreenView.h"
 #include "screens/preview/PreviewSearchBar.h"
-#include "screens/preview/PreviewSummaryView.h"
 #include "screens/preview/PreviewToolbar.h"
 #include "screens/preview/PreviewViewChoice.h"
 
@@ -34,9 +34,9 @@ namespace {
 /// The screen shows that it is loading only after this time, because a short flash would disturb.
 constexpr auto loadingDelay = std::chrono::milliseconds(300);
 
-std::shared_ptr<PreviewSummaryView> summaryView(const PreviewSummaryView::Content& content)
+std::shared_ptr<PlaceholderView> summaryView(const PlaceholderView::Content& content)
 {
-    const auto view = PreviewSummaryView::create();
+    const auto view = PlaceholderView::create();
     view->setContent(content);
     return view;
 }
@@ -310,7 +310,7 @@ void PreviewController::showSummary()
 {
     _summary =
         summaryView({.iconName = _content->iconName, .title = _content->title, .message = _content->note});
-    std::vector<PreviewSummaryView::Action> actions;
+    std::vector<PlaceholderView::Action> actions;
     if (_content->kind == PreviewContent::Kind::InCloud)
         actions.push_back({localized("Download"), weakly(this, &PreviewController::startAgain), true});
     else if (_content->canRetry)

@@ -35,7 +35,7 @@ namespace screens {
 class PreviewScreenView;
 class PreviewEditing;
 class PreviewEditor;
-class PreviewSummaryView;
+class PlaceholderView;
 class PreviewView;
 struct EditsKept;
 struct PreviewContent;
@@ -152,7 +152,7 @@ private:
     std::shared_ptr<PreviewScreenView> _screen;
     std::shared_ptr<PreviewView>
         _previewView; ///< kept while a failure is shown, because it knows the place in the document
-    std::shared_ptr<PreviewSummaryView> _summary; ///< shown in place of content
+    std::shared_ptr<PlaceholderView> _summary; ///< shown in place of content
     std::unique_ptr<ItemDownload> _download;
     std::shared_ptr<PreviewEditor> _editor;
     std::vector<std::shared_ptr<PreviewEditing>>

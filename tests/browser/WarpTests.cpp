@@ -10,10 +10,10 @@
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewItemManager.h"
 #include "screens/DocumentInteractionSheet.h"
+#include "screens/PlaceholderView.h"
 #include "screens/list/DocumentListController.h"
 #include "screens/move/MoveTargetPicker.h"
 #include "screens/preview/PreviewScreenView.h"
-#include "screens/preview/PreviewSummaryView.h"
 #include "tests/browser/support/BrowserFixture.h"
 
 #include <gmock/gmock.h>
@@ -148,13 +148,13 @@ TEST_F(WarpTest, ThePreviewedDocumentIsShownAnew)
 
 TEST_F(WarpTest, APreviewThatCannotShowADocumentOffersOtherApps)
 {
-    using screens::PreviewSummaryView;
+    using screens::PlaceholderView;
     const auto document = write("Folder/data.bin");
     launch();
     EXPECT_TRUE(warp("Folder/data.bin"));
     settle();
     const auto screen = LookwellItemController::defaultController();
-    const auto shown = std::dynamic_pointer_cast<PreviewSummaryView>(screen->screenView()->content());
+    const auto shown = std::dynamic_pointer_cast<PlaceholderView>(screen->screenView()->content());
     ASSERT_TRUE(shown && shown->buttons().size() == 1);
     shown->buttons().front()->press();
     settle();

@@ -7,13 +7,13 @@
 #include "kit/views/Button.h"
 #include "kit/views/Label.h"
 #include "kit/views/TextField.h"
+#include "screens/PlaceholderView.h"
 #include "screens/preview/PreviewContent.h"
 #include "screens/preview/PreviewController.h"
 #include "screens/preview/PreviewLoader.h"
 #include "screens/preview/PreviewPictureView.h"
 #include "screens/preview/PreviewScreenView.h"
 #include "screens/preview/PreviewSearchBar.h"
-#include "screens/preview/PreviewSummaryView.h"
 #include "screens/preview/PreviewTextView.h"
 #include "screens/preview/PreviewToolbar.h"
 #include "screens/preview/TextDecoding.h"
@@ -59,10 +59,10 @@ protected:
         documents->urls = std::move(urls);
         screen->reloadData();
     }
-    const PreviewSummaryView::Content& summary() const
+    const PlaceholderView::Content& summary() const
     {
-        const auto view = std::dynamic_pointer_cast<PreviewSummaryView>(screen->screenView()->content());
-        static const PreviewSummaryView::Content none;
+        const auto view = std::dynamic_pointer_cast<PlaceholderView>(screen->screenView()->content());
+        static const PlaceholderView::Content none;
         return view ? view->content() : none;
     }
 
@@ -215,7 +215,7 @@ TEST_F(Preview, ShowsThatItIsLoadingOnlyAfterAWhile)
 std::vector<std::string> offers(const PreviewController& screen)
 {
     std::vector<std::string> titles;
-    const auto view = std::dynamic_pointer_cast<PreviewSummaryView>(screen.screenView()->content());
+    const auto view = std::dynamic_pointer_cast<PlaceholderView>(screen.screenView()->content());
     for (const auto& button : view ? view->buttons() : std::vector<std::shared_ptr<kit::Button>>())
         titles.push_back(button->title());
     return titles;
@@ -223,7 +223,7 @@ std::vector<std::string> offers(const PreviewController& screen)
 
 void press(const PreviewController& screen)
 {
-    const auto view = std::dynamic_pointer_cast<PreviewSummaryView>(screen.screenView()->content());
+    const auto view = std::dynamic_pointer_cast<PlaceholderView>(screen.screenView()->content());
     const auto button = view->buttons().front();
     button->press();
 }
