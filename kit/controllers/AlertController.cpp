@@ -30,12 +30,6 @@ void AlertController::alertChanged()
     _alertObserver.notify([this](AlertObserver& observer) { observer.alertDidChange(*this); });
 }
 
-void AlertController::setMessage(std::string message)
-{
-    _message = std::move(message);
-    alertChanged();
-}
-
 void AlertController::addAction(const std::shared_ptr<AlertAction>& action)
 {
     _actions.push_back(action);

@@ -32,7 +32,6 @@ public:
 
     AlertStyle alertStyle() const { return _alertStyle; }
     const std::string& message() const { return _message; }
-    void setMessage(std::string message);
 
     const std::vector<std::shared_ptr<AlertAction>>& actions() const { return _actions; }
     void addAction(const std::shared_ptr<AlertAction>& action);

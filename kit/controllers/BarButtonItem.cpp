@@ -90,12 +90,6 @@ void BarButtonItem::setAccessibilityLabel(std::string label)
     changed();
 }
 
-void BarButtonItem::setWidth(double points)
-{
-    _width = points;
-    changed();
-}
-
 bool BarButtonItem::isEnabled() const
 {
     return _customView ? _customView->isEnabled() : _enabled;

@@ -53,8 +53,7 @@ public:
     /// name.
     const std::string& accessibilityLabel() const { return _accessibilityLabel; }
     void setAccessibilityLabel(std::string label);
-    double width() const { return _width; } ///< of a fixed space, points
-    void setWidth(double points);
+    static constexpr double fixedSpaceWidth = 8; ///< points
 
     /// An item with a custom view is enabled when that view is.
     bool isEnabled() const;
@@ -72,7 +71,6 @@ private:
     std::optional<Image> _image, _compactImage;
     std::shared_ptr<View> _customView;
     Action _action;
-    double _width = 8;
     bool _enabled = true;
     ObserverSlot<BarButtonItemObserver> _observer;
 };

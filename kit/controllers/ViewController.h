@@ -44,7 +44,6 @@ public:
 
     /// Loads the view when it is not loaded yet.
     const std::shared_ptr<View>& view();
-    const std::shared_ptr<View>& viewIfLoaded() const { return _view; }
     bool isViewLoaded() const { return _view != nullptr; }
     void setView(std::shared_ptr<View> view);
     virtual void loadView(); ///< the default makes an empty view

@@ -75,7 +75,6 @@ void Window::setRootViewController(std::shared_ptr<ViewController> root)
 
 void Window::makeKeyAndVisible()
 {
-    _key = true;
     if (_visible)
         return;
     _visible = true;
@@ -153,7 +152,7 @@ void Window::closed()
     if (!_visible)
         return;
     _transition.finish();
-    _visible = _key = false;
+    _visible = false;
     Screens screens = presentedScreens();
     if (_root)
         screens.insert(screens.begin(), _root);

@@ -41,7 +41,6 @@ public:
     /// Shows the window through the installed host, if there is one, and makes the root screen appear.
     void makeKeyAndVisible();
     bool isVisible() const { return _visible; }
-    bool isKey() const { return _key; }
 
     /// Answers the screens over the root, the topmost last.
     std::vector<std::shared_ptr<ViewController>> presentedScreens() const;
@@ -49,7 +48,6 @@ public:
 
     // Events up: the host reports what happened to the window.
     void resized(Size size, const TraitCollection& traits);
-    void becameKey(bool key) { _key = key; }
     /// The user asks to go back by Escape, Alt+Left or the back gesture. The topmost presented screen is
     /// cancelled; else the Cancel button of the bar is pressed; else the navigation goes back. Answers false
     /// when there is nothing to go back to.
@@ -77,7 +75,7 @@ private:
     std::shared_ptr<ViewController> _root;
     ObserverSlot<WindowObserver> _observer;
     TransitionToken _transition;
-    bool _visible = false, _key = false;
+    bool _visible = false;
 };
 
 } // namespace kit

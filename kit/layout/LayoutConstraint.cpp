@@ -96,8 +96,6 @@ std::string LayoutConstraint::description() const
     if (!_second.isNone())
         text << anchorName(_second) << " * " << _multiplier << " + ";
     text << _constant << " @" << _priority;
-    if (!_identifier.empty())
-        text << " (" << _identifier << ")";
     return text.str();
 }
 

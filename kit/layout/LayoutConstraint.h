@@ -42,8 +42,6 @@ public:
     /// Answers false, and logs a line, when the first item is gone.
     bool setActive(bool active);
 
-    const std::string& identifier() const { return _identifier; }
-    void setIdentifier(std::string identifier) { _identifier = std::move(identifier); }
     /// Answers the constraint in words, for the log.
     std::string description() const;
 
@@ -56,7 +54,6 @@ private:
     double _multiplier, _constant;
     LayoutPriority _priority = LayoutPriorities::required;
     bool _active = false;
-    std::string _identifier;
 };
 
 using LayoutConstraints = std::vector<std::shared_ptr<LayoutConstraint>>;

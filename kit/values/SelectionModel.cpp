@@ -35,12 +35,6 @@ bool SelectionModel::toggle(RowId id)
     return !wasSelected;
 }
 
-void SelectionModel::selectOnly(RowId id)
-{
-    _ids.clear();
-    select(id);
-}
-
 void SelectionModel::selectAll(std::span<const RowId> order)
 {
     _ids.insert(order);

@@ -24,7 +24,6 @@ public:
     void deselect(RowId id);
     /// Answers whether the row is selected afterwards. The row becomes the start of the next range.
     bool toggle(RowId id);
-    void selectOnly(RowId id);
     void selectAll(std::span<const RowId> order);
     /// Gives every row from the one touched last to this one, both included, the state of the row touched
     /// last: selected or not. A further call replaces the range of the call before. When no row was touched

@@ -270,7 +270,6 @@ void ListView::layoutSubviews()
 
 void ListView::contentOffsetDidChange()
 {
-    ScrollView::contentOffsetDidChange();
     updateVisibleRows(Tell::IfMoved);
 }
 

@@ -69,10 +69,4 @@ void ScrollView::userScrolled(Point offset)
     contentOffsetDidChange();
 }
 
-void ScrollView::contentOffsetDidChange()
-{
-    if (const auto callback = _onScroll)
-        callback();
-}
-
 } // namespace kit

@@ -5,8 +5,6 @@
 
 #include "kit/views/View.h"
 
-#include <functional>
-
 namespace kit {
 
 class ScrollView;
@@ -53,21 +51,18 @@ public:
     void setContentOffset(Point offset, bool animated = false);
     /// Scrolls by the least distance that brings a rectangle of the content into view.
     void scrollRectToVisible(const Rect& rect, bool animated);
-    /// The callback runs after every change of the offset, by the user or by the program.
-    void setOnScroll(std::function<void()> callback) { _onScroll = std::move(callback); }
 
     /// Event up: the user scrolled to an offset.
     void userScrolled(Point offset);
 
 protected:
-    virtual void contentOffsetDidChange();
+    virtual void contentOffsetDidChange() { }
 
 private:
     Size _contentSize;
     EdgeInsets _contentInsets;
     ScrollBehavior _behavior;
     ObserverSlot<ScrollObserver> _scrollObserver;
-    std::function<void()> _onScroll;
 };
 
 } // namespace kit

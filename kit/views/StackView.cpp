@@ -66,30 +66,9 @@ private:
     {
         const auto gap = after.anchor(_names.start);
         const auto end = before.anchor(_names.end);
-        const View& first = *_visible.front();
-        switch (_stack.distribution()) {
-        case StackDistribution::FillEqually:
-            add(after.anchor(_names.length).equalTo(first.anchor(_names.length)));
-            break;
-        case StackDistribution::FillProportionally:
-            addProportion(first, after);
-            break;
-        case StackDistribution::Fill:
-            break;
-        }
+        if (_stack.distribution() == StackDistribution::FillEqually)
+            add(after.anchor(_names.length).equalTo(_visible.front()->anchor(_names.length)));
         add(gap.equalTo(end, _stack.spacing()));
-    }
-
-    void addProportion(const View& first, const View& other)
-    {
-        const auto length = [this](const View& view) {
-            const Size size = view.intrinsicContentSize();
-            return _stack.axis() == Axis::Horizontal ? size.width : size.height;
-        };
-        if (length(first) > 0 && length(other) > 0)
-            add(other.anchor(_names.length)
-                    .equalTo(first.anchor(_names.length), 0, length(other) / length(first))
-                    ->withPriority(LayoutPriorities::required - 1));
     }
 
     void addAcross(const View& view)

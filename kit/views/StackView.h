@@ -8,7 +8,7 @@
 namespace kit {
 
 enum class StackAlignment { Fill, Leading, Center, Trailing, FirstBaseline };
-enum class StackDistribution { Fill, FillEqually, FillProportionally };
+enum class StackDistribution { Fill, FillEqually };
 
 /// Arranges views in a row or a column by constraints of its own. Hidden views take no room.
 class StackView : public View {

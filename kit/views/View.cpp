@@ -95,15 +95,6 @@ void View::insertSubview(const std::shared_ptr<View>& view, std::size_t index)
     changed(ViewChange::Subviews);
 }
 
-void View::bringSubviewToFront(const std::shared_ptr<View>& view)
-{
-    const auto found = std::find(_subviews.begin(), _subviews.end(), view);
-    if (found == _subviews.end() || found + 1 == _subviews.end())
-        return;
-    std::rotate(found, found + 1, _subviews.end());
-    changed(ViewChange::Subviews);
-}
-
 void View::removeFromSuperview()
 {
     const auto superview = _superview.lock();

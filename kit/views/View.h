@@ -63,7 +63,6 @@ public:
     const std::vector<std::shared_ptr<View>>& subviews() const { return _subviews; }
     void addSubview(const std::shared_ptr<View>& view);
     void insertSubview(const std::shared_ptr<View>& view, std::size_t index);
-    void bringSubviewToFront(const std::shared_ptr<View>& view);
     void removeFromSuperview();
     std::shared_ptr<LayoutItem> layoutParent() const override;
     std::vector<std::shared_ptr<LayoutItem>> layoutChildren() const override;

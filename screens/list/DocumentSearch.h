@@ -42,7 +42,6 @@ public:
     const std::shared_ptr<kit::SearchPresentation>& presentation() const { return _presentation; }
     const std::shared_ptr<kit::ListView>& results() const { return _results; }
     const std::shared_ptr<PlaceholderView>& placeholder() const { return _placeholder; }
-    const std::shared_ptr<DocumentRowSource>& rowSource() const { return _source; }
 
 private:
     void build();

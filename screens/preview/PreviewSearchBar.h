@@ -38,9 +38,7 @@ public:
 
     const std::shared_ptr<kit::TextField>& field() const { return _field; }
     const std::shared_ptr<kit::Label>& countLabel() const { return _count; }
-    const std::shared_ptr<kit::Button>& previousButton() const { return _previous; }
     const std::shared_ptr<kit::Button>& nextButton() const { return _next; }
-    const std::shared_ptr<kit::Button>& closeButton() const { return _close; }
 
     void layoutSubviews() override;
 

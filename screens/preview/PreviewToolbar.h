@@ -39,13 +39,7 @@ public:
     bool isEmpty() const; ///< no button is shown
 
     const std::shared_ptr<kit::Button>& findButton() const { return _find; }
-    const std::shared_ptr<kit::Button>& copyButton() const
-    {
-        return _copy;
-    } ///< shown while something is selected
     const std::shared_ptr<kit::Button>& editButton() const { return _edit; }
-    const std::shared_ptr<kit::Button>& zoomOutButton() const { return _zoomOut; }
-    const std::shared_ptr<kit::Button>& zoomInButton() const { return _zoomIn; }
     const std::shared_ptr<kit::Label>& pageLabel() const { return _page; }
 
     void layoutSubviews() override;

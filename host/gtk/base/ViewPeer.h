@@ -63,7 +63,6 @@ public:
 
 protected:
     PeerContext& context() const { return *_context; }
-    const std::shared_ptr<PeerContext>& sharedContext() const { return _context; }
     void setNative(GtkWidget* native);
     /// Answers the widget that represents the view to assistive technology.
     virtual GtkWidget* spoken() const { return _native ? _native.get() : _canvas.get(); }

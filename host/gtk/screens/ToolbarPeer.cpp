@@ -71,7 +71,7 @@ void ToolbarPeer::append(const std::shared_ptr<kit::BarButtonItem>& item, bool v
     }
     auto* space = gtk_box_new(GTK_ORIENTATION_HORIZONTAL, 0);
     if (item->systemItem() == kit::SystemItem::FixedSpace)
-        gtk_widget_set_size_request(space, static_cast<int>(item->width()), -1);
+        gtk_widget_set_size_request(space, static_cast<int>(kit::BarButtonItem::fixedSpaceWidth), -1);
     else
         gtk_widget_set_hexpand(space, !viewTakesAll);
     gtk_box_append(GTK_BOX(_box), space);

@@ -81,11 +81,8 @@ void WindowPeer::build(AdwApplication* application, const WindowSize& size)
 void WindowPeer::connectWindow()
 {
     _connections.push_back(connectNotify(_window.get(), "notify::is-active", [this] {
-        const bool active = gtk_window_is_active(window());
-        if (const auto shown = model())
-            shown->becameKey(active);
         if (const auto call = _onActive)
-            call(active);
+            call(gtk_window_is_active(window()));
     }));
     _connections.push_back(connectSignal<gboolean()>(_window.get(), "close-request", [this]() -> gboolean {
         closed();
