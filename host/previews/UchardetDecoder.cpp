@@ -3,6 +3,8 @@
 
 #include "host/previews/UchardetDecoder.h"
 
+#include "host/system/texts/DisplayableText.h"
+
 #include <glib.h>
 #include <uchardet.h>
 
@@ -63,7 +65,14 @@ struct CloseConverter {
 };
 using Converter = std::unique_ptr<std::remove_pointer_t<GIConv>, CloseConverter>;
 
-std::string converted(const Converter& converter, std::string_view bytes, TextEnd end)
+/// Null for an encoding that the C library does not know.
+Converter converterFrom(const std::string& encoding)
+{
+    auto* opened = g_iconv_open("UTF-8", encoding.c_str());
+    return Converter(opened == reinterpret_cast<GIConv>(-1) ? nullptr : opened);
+}
+
+std::string converted(const Converter& converter, std::string_view bytes, std::size_t unit, TextEnd end)
 {
     std::string text;
     char* from = const_cast<char*>(bytes.data()); // iconv only reads it
@@ -77,18 +86,20 @@ std::string converted(const Converter& converter, std::string_view bytes, TextEn
         text.append(piece, sizeof piece - room);
         if (problem == 0 || problem == E2BIG)
             continue;
-        if (problem == EINVAL && end == TextEnd::Cut)
+        // Half a unit at the end of UTF-16 or UTF-32 is no character that could be broken.
+        if (problem == EINVAL && (end == TextEnd::Cut || unit > 1))
             break;
         text += replacement;
-        ++from;
-        --left;
+        const auto broken = std::min(unit, left);
+        from += broken;
+        left -= broken;
     }
     return text;
 }
 
 } // namespace
 
-std::optional<std::string> UchardetDecoder::decode(std::string_view bytes, TextEnd end) const
+std::optional<std::string> UchardetDecoder::likelyEncoding(std::string_view bytes) const
 {
     const bool hasEscapes = bytes.find("\x1B$") != std::string_view::npos;
     if (!hasEscapes && std::ranges::count_if(bytes, isBeyondAscii) < fewestTelling)
@@ -99,10 +110,16 @@ std::optional<std::string> UchardetDecoder::decode(std::string_view bytes, TextE
     // Well-formed UTF-8 has already been decoded elsewhere.
     if (encoding.empty() || encoding.starts_with("UTF-") || encoding == "ASCII")
         return std::nullopt;
-    auto* opened = g_iconv_open("UTF-8", encoding.c_str());
-    if (opened == reinterpret_cast<GIConv>(-1))
-        return std::nullopt;
-    return converted(Converter(opened), bytes, end);
+    return converterFrom(encoding) ? std::optional(std::move(encoding)) : std::nullopt;
+}
+
+std::string UchardetDecoder::decode(std::string_view bytes, const std::string& encoding, TextEnd end) const
+{
+    const auto converter = converterFrom(encoding);
+    if (!converter)
+        return host::system::displayableText(bytes);
+    const std::size_t unit = encoding.starts_with("UTF-32") ? 4 : encoding.starts_with("UTF-16") ? 2 : 1;
+    return converted(converter, bytes, unit, end);
 }
 
 } // namespace host::previews

@@ -5,8 +5,7 @@
 
 #include "host/system/files/FileVersion.h"
 #include "host/system/files/ItemPaths.h"
-
-#include <glib.h>
+#include "host/system/texts/DisplayableText.h"
 
 #include <algorithm>
 
@@ -104,9 +103,7 @@ std::string displayable(std::string name)
     const bool isAscii = std::ranges::all_of(name, [](char c) { return static_cast<signed char>(c) >= 0; });
     if (isAscii || platform::isValidUtf8(name))
         return name;
-    const std::unique_ptr<char, decltype(&g_free)> valid(
-        g_utf8_make_valid(name.data(), static_cast<gssize>(name.size())), &g_free);
-    return valid.get();
+    return system::displayableText(name);
 }
 
 } // namespace

@@ -3,6 +3,7 @@
 
 #include "host/gtk/preview/PreviewModule.h"
 
+#include "host/system/texts/DisplayableText.h"
 #include "host/system/texts/Translate.h"
 #include "platform/Dispatch.h"
 #include "platform/Log.h"
@@ -100,10 +101,18 @@ platform::Result<std::shared_ptr<platform::PagedDocumentEditing>> PreviewModule:
     return missingError();
 }
 
-std::optional<std::string> PreviewModule::decode(std::string_view bytes, platform::TextEnd end) const
+std::optional<std::string> PreviewModule::likelyEncoding(std::string_view bytes) const
 {
     const auto libraries = load();
-    return libraries ? libraries->textDecoder().decode(bytes, end) : std::nullopt;
+    return libraries ? libraries->textDecoder().likelyEncoding(bytes) : std::nullopt;
+}
+
+std::string PreviewModule::decode(
+    std::string_view bytes, const std::string& encoding, platform::TextEnd end) const
+{
+    const auto libraries = load();
+    return libraries ? libraries->textDecoder().decode(bytes, encoding, end)
+                     : host::system::displayableText(bytes);
 }
 
 std::string PreviewModule::missingWords()

@@ -53,7 +53,11 @@ public:
 
     /// Loads the libraries first. Answers nothing when the module is missing, else what the module's decoder
     /// answers.
-    std::optional<std::string> decode(std::string_view bytes, platform::TextEnd end) const override;
+    std::optional<std::string> likelyEncoding(std::string_view bytes) const override;
+    /// Loads the libraries first. When the module is missing, what is no UTF-8 becomes replacement
+    /// characters.
+    std::string decode(
+        std::string_view bytes, const std::string& encoding, platform::TextEnd end) const override;
 
     /// The sentence for the screen when the libraries are missing, and the error with that sentence.
     static std::string missingWords();

@@ -4,17 +4,14 @@
 #include "host/system/files/SystemErrors.h"
 
 #include "host/system/files/ItemPaths.h"
-
+#include "host/system/texts/DisplayableText.h"
 #include "host/system/texts/Translate.h"
 #include "platform/Localization.h"
-
-#include <glib.h>
 
 #include <algorithm>
 #include <cerrno>
 #include <cstring>
 #include <iterator>
-#include <memory>
 
 namespace host::system {
 
@@ -88,9 +85,7 @@ std::string displayName(std::string_view path)
 {
     if (path.size() > 1)
         path = lastName(path);
-    const std::unique_ptr<char, decltype(&g_free)> valid(
-        g_utf8_make_valid(path.empty() ? "" : path.data(), static_cast<gssize>(path.size())), g_free);
-    return valid.get();
+    return displayableText(path);
 }
 
 Error systemError(int errorNumber, std::string_view path, const std::optional<std::string>& destination)
