@@ -20,6 +20,8 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
+using host::system::SystemResult;
 using platform::Result;
 
 namespace {
@@ -47,7 +49,7 @@ std::string pathOf(const FileDescriptor& file)
 
 } // namespace
 
-Result<IdentifiedItem> IdentifiedItem::open(const DriveLayout& layout, const std::string& path)
+SystemResult<IdentifiedItem> IdentifiedItem::open(const DriveLayout& layout, const std::string& path)
 {
     IdentifiedItem item(layout, path);
     item._file = openBeneath(layout.home(), path, O_PATH);
@@ -56,9 +58,9 @@ Result<IdentifiedItem> IdentifiedItem::open(const DriveLayout& layout, const std
         item._isPromise = true;
     }
     if (!item._file || ::fstat(item._file.get(), &item._status) != 0)
-        return failed(errno);
+        return SystemError::last(path);
     if (S_ISLNK(item._status.st_mode))
-        return failed(ELOOP);
+        return SystemError(ELOOP, path);
     return item;
 }
 
@@ -75,36 +77,37 @@ bool IdentifiedItem::canCarryIdentifier() const
     return S_ISREG(_status.st_mode) || (!_isPromise && S_ISDIR(_status.st_mode));
 }
 
-int IdentifiedItem::carry(std::uint32_t identifier) const
+SystemError IdentifiedItem::carry(std::uint32_t identifier) const
 {
     if (_isPromise)
         return carryInPromise(identifier);
     const auto text = std::to_string(identifier);
     const auto path = descriptorPath(_file);
-    return ::setxattr(path.c_str(), itemMark::documentIdentifier, text.data(), text.size(), 0) == 0 ? 0
-                                                                                                    : errno;
+    return SystemError::unless(
+        ::setxattr(path.c_str(), itemMark::documentIdentifier, text.data(), text.size(), 0) == 0, _path);
 }
 
-int IdentifiedItem::carryInPromise(std::uint32_t identifier) const
+SystemError IdentifiedItem::carryInPromise(std::uint32_t identifier) const
 {
     const auto entry = DriveEntry::open(_layout, _layout.home() + '/' + _path);
-    struct stat found;
-    if (!entry
-        || ::fstatat(entry->folder.get(), entry->promiseName().c_str(), &found, AT_SYMLINK_NOFOLLOW) != 0)
-        return entry ? errno : ESTALE;
-    if (found.st_ino != _status.st_ino || found.st_dev != _status.st_dev)
-        return ESTALE;
+    if (!entry)
+        return {ESTALE, _path};
+    const auto found = statusAt(entry->folder, entry->promiseName());
+    if (!found)
+        return found.error;
+    if (found->st_ino != _status.st_ino || found->st_dev != _status.st_dev)
+        return {ESTALE, _path};
     ::lseek(_file.get(), 0, SEEK_SET);
     const auto text = readSmallFile(_file, _path, PromiseRecord::maximumFileSize);
     auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
     if (!promise)
-        return EBADMSG;
+        return {EBADMSG, _path};
     promise->documentIdentifier = identifier;
     const auto error = host::system::writeFileAtomically(
         entry->folder, entry->promiseName(), promise->toJson(), entry->path);
     if (!error)
-        return 0;
-    return error->domain() == platform::errorDomain::system ? error->code() : EIO;
+        return {};
+    return {error->domain() == platform::errorDomain::system ? error->code() : EIO, _path};
 }
 
 Result<platform::DocumentIdentifiers::OpenFile::Attributes> IdentifiedItem::attributes() const

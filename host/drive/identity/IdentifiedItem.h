@@ -6,6 +6,7 @@
 #include "host/drive/identity/DocumentIndex.h"
 #include "host/drive/records/DriveLayout.h"
 #include "host/system/files/FileDescriptor.h"
+#include "host/system/files/SystemError.h"
 #include "platform/DocumentIdentifiers.h"
 
 #include <sys/stat.h>
@@ -17,23 +18,21 @@ namespace host::drive {
 class IdentifiedItem : public platform::DocumentIdentifiers::OpenFile {
 public:
     /// Opens what is at a path below the drive's home, without following a link: the item, else its promise.
-    /// Errors, here and below, are the system's.
-    static platform::Result<IdentifiedItem> open(const DriveLayout& layout, const std::string& path);
+    static system::SystemResult<IdentifiedItem> open(const DriveLayout& layout, const std::string& path);
 
     /// What it carries; 0 for none, and for a promise that cannot be read.
     std::uint32_t identifier() const;
     /// Whether it is a file or a folder, or the promise of one: nothing else can carry an identifier.
     bool canCarryIdentifier() const;
-    /// Makes it carry another identifier; answers 0 or the errno. A promise is replaced by a new file, which
-    /// this one is not.
-    int carry(std::uint32_t identifier) const;
+    /// Makes it carry another identifier. A promise is replaced by a new file, which this one is not.
+    system::SystemError carry(std::uint32_t identifier) const;
 
     std::uint64_t device() const { return _status.st_dev; }
     std::uint64_t inode() const { return _status.st_ino; }
     /// Where the item was opened.
     DocumentPlace place() const { return {_path, device(), inode()}; }
-    /// Asks the open file; its place is where it lies now. Errors: ENOENT when it has been removed, EXDEV
-    /// when it was moved out of the documents area.
+    /// Asks the open file; its place is where it lies now. Errors: the system's, ENOENT when it has been
+    /// removed, EXDEV when it was moved out of the documents area.
     platform::Result<Attributes> attributes() const override;
 
 private:
@@ -42,7 +41,7 @@ private:
         , _path(std::move(path))
     {
     }
-    int carryInPromise(std::uint32_t identifier) const;
+    system::SystemError carryInPromise(std::uint32_t identifier) const;
 
     DriveLayout _layout;
     std::string _path;

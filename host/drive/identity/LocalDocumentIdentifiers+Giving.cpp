@@ -51,10 +51,9 @@ Result<std::uint32_t> LocalDocumentIdentifiers::identifyAt(const std::string& pa
 {
     const auto lock = lockGiving(_layout);
     const auto item = IdentifiedItem::open(_layout, path);
-    const int failure = item ? 0 : item.error->code();
-    if (failure != 0 && failure != ELOOP)
-        return itemError(failure, path);
-    if (failure == ELOOP || !item->canCarryIdentifier())
+    if (!item && !item.error.is(ELOOP))
+        return itemError(item.error, path);
+    if (!item || !item->canCarryIdentifier())
         return platform::Error(platform::FileErrorCode::Unsupported);
     // Whether another item has the identifier can be told only by an index that knows them all.
     if (_index.prepareForWriting() == DocumentIndex::State::Incomplete)
@@ -97,7 +96,7 @@ Result<std::uint32_t> LocalDocumentIdentifiers::giveIdentifier(const IdentifiedI
     const auto identifier = _index.reserve(place);
     if (!identifier)
         return itemError(EAGAIN, place.path);
-    if (const int failure = item.carry(*identifier); failure != 0) {
+    if (const auto failure = item.carry(*identifier)) {
         _index.release(*identifier);
         return itemError(failure, place.path);
     }

@@ -34,9 +34,10 @@ std::optional<std::string> physicalPath(const std::string& path, struct stat& st
 {
     if (::lstat(path.c_str(), &status) == 0)
         return path;
+    const bool isMissing = errno == ENOENT;
     auto promise = PromiseRecord::pathFor(path);
-    return errno == ENOENT && ::lstat(promise.c_str(), &status) == 0 ? std::optional(std::move(promise))
-                                                                     : std::nullopt;
+    return isMissing && ::lstat(promise.c_str(), &status) == 0 ? std::optional(std::move(promise))
+                                                               : std::nullopt;
 }
 
 } // namespace
@@ -104,7 +105,7 @@ Result<std::shared_ptr<const platform::DocumentIdentifiers::OpenFile>> LocalDocu
         // A link may lead to where the document went; then only a search finds its own place.
         for (const auto& known : _index.documentsWithin(file.place))
             searchInBackground(known);
-        return *item.error;
+        return failed(item.error.number());
     }
     if (item->inode() != file.number)
         return failed(ESTALE);
@@ -213,7 +214,7 @@ void LocalDocumentIdentifiers::seen(std::uint32_t identifier, const std::string&
 void LocalDocumentIdentifiers::correct(std::uint32_t identifier, const std::string& path)
 {
     const auto relative = relativePath(path);
-    const auto item = relative ? IdentifiedItem::open(_layout, *relative) : Result<IdentifiedItem>();
+    const auto item = relative ? IdentifiedItem::open(_layout, *relative) : system::SystemError(ENOENT, path);
     if (!item || item->identifier() != identifier)
         return;
     const auto answer = _index.lookUp(identifier);
