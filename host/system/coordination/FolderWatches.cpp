@@ -7,11 +7,11 @@
 
 namespace host::system {
 
-int FolderWatches::hold(const std::string& folder)
+SystemResult<int> FolderWatches::hold(const std::string& folder)
 {
-    const int watch = _inotify->watch(folder);
-    if (watch >= 0)
-        ++_holders[watch];
+    auto watch = _inotify->watch(folder);
+    if (watch)
+        ++_holders[*watch];
     return watch;
 }
 

@@ -19,8 +19,8 @@ public:
     {
     }
 
-    /// One more holder. Answers the watch, or -1 and errno as Inotify::watch().
-    int hold(const std::string& folder);
+    /// One more holder. Answers the watch; errors as Inotify::watch().
+    SystemResult<int> hold(const std::string& folder);
     /// One holder less; -1 is nobody's watch.
     void release(int watch);
     /// What happened in the watched folders since the last call.

@@ -112,12 +112,11 @@ std::optional<Error> LocalFileCoordinator::runLocked(const Claims& claims, const
         if (isBlocked(claim))
             return systemError(EDEADLK, claim.path);
     }
-    FileDescriptor held;
-    if (const int failure = missing.empty() ? 0 : _locks.acquire(missing, _lockPatience, held);
-        failure != 0) {
-        op.warning(
-            "Cannot lock %@: %{public}s", missing.front().path, std::generic_category().message(failure));
-        return systemError(failure, missing.front().path);
+    const auto held = missing.empty() ? FileDescriptor() : _locks.acquire(missing, _lockPatience);
+    if (!held) {
+        op.warning("Cannot lock %@: %{public}s", missing.front().path,
+            std::generic_category().message(held.error.number()));
+        return systemError(held.error, missing.front().path);
     }
     const EnteredClaims entered(missing);
     body();

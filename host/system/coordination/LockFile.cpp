@@ -57,7 +57,7 @@ private:
     int _taken = 0;
 };
 
-int lockByte(const FileDescriptor& file, std::int64_t byte, LockMode mode, Pauses& pauses)
+SystemError lockByte(const FileDescriptor& file, std::int64_t byte, LockMode mode, Pauses& pauses)
 {
     struct flock lock { };
     lock.l_type = mode == LockMode::Exclusive ? F_WRLCK : F_RDLCK;
@@ -66,11 +66,11 @@ int lockByte(const FileDescriptor& file, std::int64_t byte, LockMode mode, Pause
     lock.l_len = 1;
     while (::fcntl(file.get(), F_OFD_SETLK, &lock) != 0) {
         if (errno != EINTR && errno != EAGAIN && errno != EACCES)
-            return errno;
+            return SystemError::last();
         if (!pauses.next())
-            return EBUSY;
+            return SystemError(EBUSY);
     }
-    return 0;
+    return {};
 }
 
 } // namespace
@@ -96,8 +96,8 @@ void LockFile::addPath(Bytes& bytes, const Claim& claim)
         own = LockMode::Exclusive;
 }
 
-int LockFile::acquire(
-    const std::vector<Claim>& claims, platform::Duration patience, FileDescriptor& held) const
+SystemResult<FileDescriptor> LockFile::acquire(
+    const std::vector<Claim>& claims, platform::Duration patience) const
 {
     Bytes bytes;
     for (const auto& claim : claims)
@@ -105,14 +105,11 @@ int LockFile::acquire(
     constexpr int flags = O_RDWR | O_CREAT | O_CLOEXEC | O_NOCTTY;
     FileDescriptor file(::open(_path.c_str(), flags, S_IRUSR | S_IWUSR));
     if (!file)
-        return errno;
+        return SystemError::last(_path);
     Pauses pauses(patience);
-    for (const auto& [byte, mode] : bytes) {
-        if (const int failure = lockByte(file, byte, mode, pauses); failure != 0)
-            return failure;
-    }
-    held = std::move(file);
-    return 0;
+    for (const auto& [byte, mode] : bytes)
+        TRW_TRY(lockByte(file, byte, mode, pauses));
+    return file;
 }
 
 } // namespace host::system

@@ -4,6 +4,7 @@
 #pragma once
 
 #include "host/system/files/FileDescriptor.h"
+#include "host/system/files/SystemError.h"
 #include "platform/Dispatch.h"
 
 #include <cstdint>
@@ -33,10 +34,10 @@ public:
     /// they are missing.
     explicit LockFile(std::string path);
 
-    /// Waits until all claims can be had, but no longer than `patience` in all. Answers 0, and the open file
-    /// that holds the locks until it is closed, else the errno of what failed: EBUSY when someone else kept
-    /// them all that time, EROFS or EACCES when the file cannot be written.
-    int acquire(const std::vector<Claim>& claims, platform::Duration patience, FileDescriptor& held) const;
+    /// Waits until all claims can be had, but no longer than `patience` in all. Answers the open file that
+    /// holds the locks until it is closed. Errors: EBUSY when someone else kept them all that time, EROFS or
+    /// EACCES when the file cannot be written.
+    SystemResult<FileDescriptor> acquire(const std::vector<Claim>& claims, platform::Duration patience) const;
 
 private:
     using Bytes = std::map<std::int64_t, LockMode>;

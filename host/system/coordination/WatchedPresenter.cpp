@@ -69,10 +69,12 @@ void WatchedPresenter::stop(FolderWatches& watches)
 
 int WatchedPresenter::hold(FolderWatches& watches, const std::string& folder)
 {
-    const int watch = watches.hold(folder);
+    const auto watch = watches.hold(folder);
+    if (watch)
+        return *watch;
     // A folder that is not there is noticed in the folder above it.
-    _isBlind |= watch < 0 && errno != ENOENT && errno != ENOTDIR;
-    return watch;
+    _isBlind |= !watch.error.is(ENOENT) && !watch.error.is(ENOTDIR);
+    return -1;
 }
 
 void WatchedPresenter::link(FolderWatches& watches)

@@ -66,6 +66,7 @@ private:
         std::string name; ///< the one in the watched folder that leads to the item
     };
     void link(FolderWatches& watches);
+    /// The watch of a folder, or -1.
     int hold(FolderWatches& watches, const std::string& folder);
     PresentedItem::Finding see();
     void markMissed();

@@ -122,15 +122,18 @@ Inotify::~Inotify()
         g_source_remove(_state->source);
 }
 
-int Inotify::watch(const std::string& folder)
+SystemResult<int> Inotify::watch(const std::string& folder)
 {
     {
         const std::lock_guard lock(_state->mutex);
         if (!State::open(_state))
-            return -1;
+            return SystemError::last(folder);
     }
     // Looking the folder up may take long on a storage that hangs; events are read meanwhile.
-    return ::inotify_add_watch(_state->descriptor.get(), folder.c_str(), _state->events);
+    const int watch = ::inotify_add_watch(_state->descriptor.get(), folder.c_str(), _state->events);
+    if (watch < 0)
+        return SystemError::last(folder);
+    return watch;
 }
 
 void Inotify::unwatch(int watch)

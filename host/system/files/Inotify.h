@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "host/system/files/SystemError.h"
+
 #include <cstdint>
 #include <functional>
 #include <memory>
@@ -35,9 +37,8 @@ public:
     Inotify& operator=(const Inotify&) = delete;
 
     /// Watches the names in a folder: made, removed, moved, written, with other attributes. Answers the
-    /// watch, the same one for the same folder, or -1 and errno: ENOSPC or EMFILE when the system has none
-    /// left.
-    int watch(const std::string& folder);
+    /// watch, the same one for the same folder. Errors: ENOSPC or EMFILE when the system has none left.
+    SystemResult<int> watch(const std::string& folder);
     void unwatch(int watch);
 
     /// Everything that happened until this call and was not taken yet, in order.

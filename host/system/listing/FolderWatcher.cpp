@@ -50,7 +50,7 @@ FolderWatcher::FolderWatcher(Handler changed, Handler written)
 bool FolderWatcher::watch(const std::string& folder)
 {
     const std::lock_guard lock(_state->mutex);
-    const int watch = _state->inotify->watch(folder);
+    const int watch = _state->inotify->watch(folder).value.value_or(-1);
     if (_state->watch >= 0 && _state->watch != watch)
         _state->inotify->unwatch(_state->watch);
     _state->watch = watch;
