@@ -38,10 +38,10 @@ double floorOnce(const std::string& path)
 {
     const auto begin = Clock::now();
     const auto folder = host::system::openFolder(path);
-    DirectoryReader reader(folder);
+    DirectoryReader reader(*folder);
     struct statx found;
     while (const auto entry = reader.next()) {
-        statx(folder.get(), entry->name.data(), AT_SYMLINK_NOFOLLOW, STATX_BASIC_STATS, &found);
+        statx(folder->get(), entry->name.data(), AT_SYMLINK_NOFOLLOW, STATX_BASIC_STATS, &found);
         benchmark::DoNotOptimize(found.stx_size);
     }
     return milliseconds(Clock::now() - begin);

@@ -130,7 +130,9 @@ std::size_t walk(const std::string& path)
 {
     std::size_t count = 0;
     const auto folder = host::system::openFolder(path);
-    host::system::DirectoryReader reader(folder);
+    if (!folder)
+        return count;
+    host::system::DirectoryReader reader(*folder);
     while (const auto entry = reader.next()) {
         ++count;
         if (entry->type == platform::FileType::Directory)

@@ -128,20 +128,20 @@ platform::Result<std::vector<std::string>> LocalCloudStore::listChanges(platform
 {
     std::vector<std::string> names;
     const auto folder = system::openFolder(_layout.cloud());
-    if (!folder && errno != ENOENT)
-        return itemError(errno, _layout.cloud());
+    if (!folder && !folder.error.is(ENOENT))
+        return itemError(folder.error, _layout.cloud());
     if (!folder)
         return names;
-    const auto reader = std::make_unique<system::DirectoryReader>(folder);
+    const auto reader = std::make_unique<system::DirectoryReader>(*folder);
     while (const auto entry = reader->next()) {
         struct stat found;
         // A rename into the folder sets the time of change and leaves that of the content.
-        if (::fstatat(folder.get(), entry->name.data(), &found, AT_SYMLINK_NOFOLLOW) == 0
+        if (::fstatat(folder->get(), entry->name.data(), &found, AT_SYMLINK_NOFOLLOW) == 0
             && versionOf(found).changed >= since.nanoseconds)
             names.emplace_back(entry->name);
     }
-    if (reader->errorNumber() != 0)
-        return itemError(reader->errorNumber(), _layout.cloud());
+    if (reader->error())
+        return itemError(reader->error(), _layout.cloud());
     return names;
 }
 

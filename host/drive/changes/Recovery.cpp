@@ -169,7 +169,7 @@ void Recovery::settleStrays()
     const auto folder = system::openFolder(_layout.held());
     if (!folder)
         return;
-    const auto names = readNames(folder);
+    const auto names = readNames(*folder);
     if (!names)
         return;
     for (const auto& name : *names) {

@@ -88,14 +88,16 @@ private:
         if (_levels.empty())
             return {};
         auto above = openFolderAt(_current, "..");
+        if (!above)
+            return above.error;
         struct stat found;
         // Whoever moved the folder away took its contents along; its new parent is no business of ours.
-        if (!above || ::fstat(above.get(), &found) != 0)
+        if (::fstat(above->get(), &found) != 0)
             return SystemError::last("..");
         auto& level = _levels.back();
         if (found.st_dev != level.device || found.st_ino != level.inode)
             return {ESTALE, level.subfolders.back()};
-        _current = std::move(above);
+        _current = std::move(*above);
         const auto name = std::move(level.subfolders.back());
         level.subfolders.pop_back();
         return _visitor.leaveFolder(_current, name);
@@ -151,8 +153,8 @@ SystemResult<std::vector<std::string>> readNames(const FileDescriptor& folder)
     const auto reader = std::make_unique<DirectoryReader>(folder);
     while (const auto entry = reader->next())
         names.emplace_back(entry->name);
-    if (reader->errorNumber() != 0)
-        return SystemError(reader->errorNumber());
+    if (reader->error())
+        return reader->error();
     return names;
 }
 

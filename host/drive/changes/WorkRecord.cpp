@@ -93,7 +93,7 @@ void WorkRecord::forEachAbandoned(const DriveLayout& layout, const std::function
     const auto folder = system::openFolder(layout.held());
     if (!folder)
         return;
-    const auto reader = std::make_unique<system::DirectoryReader>(folder);
+    const auto reader = std::make_unique<system::DirectoryReader>(*folder);
     while (const auto entry = reader->next()) {
         if (!entry->name.ends_with(recordSuffix))
             continue;

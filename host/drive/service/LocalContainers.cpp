@@ -141,7 +141,7 @@ std::vector<ContainerPointer> LocalContainers::allContainers() const
     const auto area = host::system::openFolder(_layout.documents());
     if (!area)
         return containers;
-    host::system::DirectoryReader reader(area);
+    host::system::DirectoryReader reader(*area);
     while (const auto entry = reader.next()) {
         if (auto container = containerWithIdentifier(std::string(entry->name)))
             containers.push_back(std::move(container));

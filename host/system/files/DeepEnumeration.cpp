@@ -27,21 +27,22 @@ constexpr std::size_t openLevels = 64;
 void DeepEnumeration::run()
 {
     auto descriptor = openFolder(_root.path());
-    auto next = descriptor ? enter(std::move(descriptor), _root.path()) : fail(_root.path(), errno);
+    auto next =
+        descriptor ? enter(std::move(*descriptor), _root.path()) : fail(_root.path(), descriptor.error);
     while (next == Continue::Yes && !_levels.empty())
         next = _levels.back().subfolders.empty() ? leave() : descend();
 }
 
-DeepEnumeration::Continue DeepEnumeration::fail(const std::string& path, int errorNumber)
+DeepEnumeration::Continue DeepEnumeration::fail(const std::string& path, const SystemError& failure)
 {
-    return _error(Url::fileURL(path, PathKind::Directory), systemError(errorNumber, path));
+    return _error(Url::fileURL(path, PathKind::Directory), systemError(failure, path));
 }
 
 DeepEnumeration::Continue DeepEnumeration::enter(FileDescriptor descriptor, std::string path)
 {
     struct stat found;
     if (::fstat(descriptor.get(), &found) != 0)
-        return fail(path, errno);
+        return fail(path, SystemError::last());
     _levels.push_back({std::move(path), std::move(descriptor), found.st_dev, found.st_ino, {}});
     if (_levels.size() > openLevels)
         _levels[_levels.size() - openLevels - 1].descriptor.reset();
@@ -61,7 +62,7 @@ DeepEnumeration::Continue DeepEnumeration::readEntries(Level& level)
             return Continue::No;
     }
     std::ranges::reverse(level.subfolders);
-    return reader.errorNumber() ? fail(level.path, reader.errorNumber()) : Continue::Yes;
+    return reader.error() ? fail(level.path, reader.error()) : Continue::Yes;
 }
 
 DeepEnumeration::Continue DeepEnumeration::report(const Level& level, std::string_view name, FileType type)
@@ -77,7 +78,7 @@ DeepEnumeration::Continue DeepEnumeration::descend()
     level.subfolders.pop_back();
     auto path = level.path + '/' + name;
     auto descriptor = openFolderAt(level.descriptor, name);
-    return descriptor ? enter(std::move(descriptor), std::move(path)) : fail(path, errno);
+    return descriptor ? enter(std::move(*descriptor), std::move(path)) : fail(path, descriptor.error);
 }
 
 DeepEnumeration::Continue DeepEnumeration::leave()
@@ -87,16 +88,16 @@ DeepEnumeration::Continue DeepEnumeration::leave()
     if (_levels.empty() || _levels.back().descriptor)
         return Continue::Yes;
     auto& level = _levels.back();
-    level.descriptor = openFolderAt(below.descriptor, "..");
+    level.descriptor = openFolderAt(below.descriptor, "..").value.value_or(FileDescriptor());
     // When someone moved the folder below meanwhile, its parent is another one now.
     if (!isAt(level))
-        level.descriptor = openFolder(level.path);
+        level.descriptor = openFolder(level.path).value.value_or(FileDescriptor());
     if (isAt(level))
         return Continue::Yes;
     level.descriptor.reset();
     const bool isLost = !level.subfolders.empty();
     level.subfolders.clear();
-    return isLost ? fail(level.path, ESTALE) : Continue::Yes;
+    return isLost ? fail(level.path, SystemError(ESTALE)) : Continue::Yes;
 }
 
 bool DeepEnumeration::isAt(const Level& level)

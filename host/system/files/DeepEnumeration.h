@@ -4,6 +4,7 @@
 #pragma once
 
 #include "host/system/files/FileDescriptor.h"
+#include "host/system/files/SystemError.h"
 #include "platform/FileSystem.h"
 
 #include <sys/types.h>
@@ -47,7 +48,7 @@ private:
     Continue report(const Level& level, std::string_view name, platform::FileType type);
     Continue descend();
     Continue leave();
-    Continue fail(const std::string& path, int errorNumber);
+    Continue fail(const std::string& path, const SystemError& failure);
     /// Whether the level's descriptor is open on the folder that the level began with.
     static bool isAt(const Level& level);
 

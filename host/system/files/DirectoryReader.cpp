@@ -30,7 +30,7 @@ std::optional<FileType> typeOf(const dirent64& entry)
 bool DirectoryReader::fill()
 {
     const auto read = getdents64(_descriptor, _buffer.data(), _buffer.size());
-    _errorNumber = read < 0 ? errno : 0;
+    _error = SystemError::unless(read >= 0);
     _position = 0;
     _end = read > 0 ? static_cast<std::size_t>(read) : 0;
     return _end > 0;
@@ -68,14 +68,20 @@ std::optional<FileType> typeOfEntry(const FileDescriptor& folder, std::string_vi
     return fileType(attributes.stx_mode);
 }
 
-FileDescriptor openFolder(const std::string& path)
+SystemResult<FileDescriptor> openFolder(const std::string& path)
 {
-    return FileDescriptor(::open(path.c_str(), openFlags));
+    FileDescriptor folder(::open(path.c_str(), openFlags));
+    if (!folder)
+        return SystemError::last(path);
+    return folder;
 }
 
-FileDescriptor openFolderAt(const FileDescriptor& parent, const std::string& name)
+SystemResult<FileDescriptor> openFolderAt(const FileDescriptor& parent, const std::string& name)
 {
-    return FileDescriptor(::openat(parent.get(), name.c_str(), openFlags));
+    FileDescriptor folder(::openat(parent.get(), name.c_str(), openFlags));
+    if (!folder)
+        return SystemError::last(name);
+    return folder;
 }
 
 } // namespace host::system

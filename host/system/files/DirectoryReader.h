@@ -4,6 +4,7 @@
 #pragma once
 
 #include "host/system/files/FileDescriptor.h"
+#include "host/system/files/SystemError.h"
 #include "platform/FileSystem.h"
 
 #include <array>
@@ -29,16 +30,16 @@ public:
     DirectoryReader(const DirectoryReader&) = delete;
     DirectoryReader& operator=(const DirectoryReader&) = delete;
 
-    /// The next entry; nothing at the end, and when reading failed (see errorNumber()).
+    /// The next entry; nothing at the end, and when reading failed (see error()).
     std::optional<Entry> next();
-    /// Why reading ended early; 0 when it did not.
-    int errorNumber() const { return _errorNumber; }
+    /// Why reading ended early, if it did.
+    const SystemError& error() const { return _error; }
 
 private:
     bool fill();
 
     int _descriptor;
-    int _errorNumber = 0;
+    SystemError _error;
     std::size_t _position = 0, _end = 0;
     alignas(8) std::array<char, 64 * 1024> _buffer;
 };
@@ -47,8 +48,8 @@ private:
 std::optional<platform::FileType> typeOfEntry(const FileDescriptor& folder, std::string_view name);
 /// The type behind the mode bits of a stat call.
 platform::FileType fileType(unsigned mode);
-/// Opens a folder for reading its entries; a link is not followed. On failure errno tells why.
-FileDescriptor openFolder(const std::string& path);
-FileDescriptor openFolderAt(const FileDescriptor& parent, const std::string& name);
+/// Opens a folder for reading its entries; a link is not followed.
+SystemResult<FileDescriptor> openFolder(const std::string& path);
+SystemResult<FileDescriptor> openFolderAt(const FileDescriptor& parent, const std::string& name);
 
 } // namespace host::system

@@ -97,19 +97,19 @@ void PosixFileSystem::enumerateShallowly(const platform::Url& folder,
 {
     const auto descriptor = openFolder(folder.path());
     if (!descriptor) {
-        error(folder, systemError(errno, folder.path()));
+        error(folder, systemError(descriptor.error, folder.path()));
         return;
     }
-    DirectoryReader reader(descriptor);
+    DirectoryReader reader(*descriptor);
     while (const auto found = reader.next()) {
-        const auto type = found->type ? found->type : typeOfEntry(descriptor, found->name);
+        const auto type = found->type ? found->type : typeOfEntry(*descriptor, found->name);
         const auto kind =
             type == FileType::Directory ? platform::PathKind::Directory : platform::PathKind::Unknown;
         if (type && entry(folder.appendingPathComponent(found->name, kind), *type) == Continue::No)
             return;
     }
-    if (reader.errorNumber())
-        error(folder, systemError(reader.errorNumber(), folder.path()));
+    if (reader.error())
+        error(folder, systemError(reader.error(), folder.path()));
 }
 
 } // namespace host::system

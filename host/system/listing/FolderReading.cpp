@@ -91,19 +91,19 @@ void FolderReading::open()
 {
     if (_isCancelled)
         return;
-    _descriptor = openFolder(_subject.folder.path());
-    if (!_descriptor)
-        return fail(errno);
+    auto folder = openFolder(_subject.folder.path());
+    if (!folder)
+        return fail(folder.error);
+    _descriptor = std::move(*folder);
     _handlers.opened(_descriptor);
     _reader.emplace(_descriptor);
     readBlock();
 }
 
-void FolderReading::fail(int errorNumber)
+void FolderReading::fail(const SystemError& failure)
 {
     FolderSnapshot::Builder builder(_subject.folder);
-    _handlers.snapshot(
-        builder.finish(ListingStage::Failed, systemError(errorNumber, _subject.folder.path())));
+    _handlers.snapshot(builder.finish(ListingStage::Failed, systemError(failure, _subject.folder.path())));
 }
 
 void FolderReading::readBlock()
@@ -114,8 +114,8 @@ void FolderReading::readBlock()
     const bool isLast = block->count() < blockEntries;
     if (isLast)
         appendExtraItems(*block);
-    if (isLast && _reader->errorNumber())
-        _error = systemError(_reader->errorNumber(), _subject.folder.path());
+    if (isLast && _reader->error())
+        _error = systemError(_reader->error(), _subject.folder.path());
     _blocks.push_back(block);
     if (!isLast) {
         ++_unfinished;

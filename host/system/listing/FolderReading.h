@@ -63,7 +63,7 @@ private:
     void merge();
     void appendRow(platform::FolderSnapshot::Builder& builder, const ListingBlock& block, std::size_t number);
     std::unordered_set<std::string_view> promisesOfPresentItems() const;
-    void fail(int errorNumber);
+    void fail(const SystemError& failure);
 
     const std::shared_ptr<const ListingTools> _tools;
     const Subject _subject;

@@ -224,8 +224,8 @@ void WatchedListing::startRevising()
     _tools->queue->addOperation([weak = weak_from_this(), before = _latest, names, tools = _tools,
                                     subject = _subject, inbox = _inbox, queue = _dispatch->mainQueue()] {
         const auto folder = openFolder(subject.folder.path());
-        const bool isSame = folder && inbox->folder() == identityOf(folder);
-        auto after = isSame ? revisedList(*tools, subject.grouping, folder, before, names) : nullptr;
+        const bool isSame = folder && inbox->folder() == identityOf(*folder);
+        auto after = isSame ? revisedList(*tools, subject.grouping, *folder, before, names) : nullptr;
         queue->async(weakly(weak, &WatchedListing::revisingEnded, before, std::move(after)));
     });
 }

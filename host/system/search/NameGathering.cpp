@@ -71,16 +71,16 @@ NameIndex NameGathering::gather(const std::vector<std::string>& roots)
     return _builder.finish();
 }
 
-void NameGathering::enter(FileDescriptor descriptor, std::string path)
+void NameGathering::enter(SystemResult<FileDescriptor> folder, std::string path)
 {
-    if (!descriptor)
+    if (!folder)
         return;
-    const auto modified = modificationTime(descriptor);
+    const auto modified = modificationTime(*folder);
     const bool isSettled = now() - modified > unsettled;
     const auto known = _earlierFolders.find(path);
     const bool isKept =
         known != _earlierFolders.end() && modified != 0 && known->second->modified == modified;
-    Level level{path, std::move(descriptor), {}};
+    Level level{path, std::move(*folder), {}};
     _builder.beginFolder(std::move(path), isSettled ? modified : 0);
     if (isKept)
         copy(*known->second, level.subfolders);

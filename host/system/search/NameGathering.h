@@ -4,6 +4,7 @@
 #pragma once
 
 #include "host/system/files/FileDescriptor.h"
+#include "host/system/files/SystemError.h"
 #include "host/system/listing/EntryClassifier.h"
 #include "host/system/search/NameIndex.h"
 #include "host/system/texts/NameFolding.h"
@@ -44,7 +45,7 @@ private:
         std::vector<std::string> subfolders; ///< still to be walked
     };
 
-    void enter(FileDescriptor descriptor, std::string path);
+    void enter(SystemResult<FileDescriptor> folder, std::string path);
     void descend();
     void copy(const NameIndex::Folder& folder, std::vector<std::string>& subfolders);
     void read(const FileDescriptor& descriptor, std::vector<std::string>& subfolders);
