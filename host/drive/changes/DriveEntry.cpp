@@ -36,8 +36,8 @@ Result<DriveEntry> DriveEntry::open(const DriveLayout& layout, const std::string
         return itemError(EINVAL, path);
     auto folder = openBeneath(root, parent, O_PATH | O_DIRECTORY);
     if (!folder)
-        return host::system::systemError(errno, path.substr(0, slash));
-    return DriveEntry{std::move(folder), std::move(name), path};
+        return host::system::systemError(folder.error, path.substr(0, slash));
+    return DriveEntry{std::move(*folder), std::move(name), path};
 }
 
 SystemResult<struct stat> DriveEntry::status() const

@@ -104,20 +104,22 @@ SystemError copyFolder(const FileDescriptor& folder, const std::string& name, co
     const std::string& newName, int level)
 {
     const auto from = openSubfolder(folder, name);
+    if (!from)
+        return from.error;
     struct stat status;
-    if (!from || ::fstat(from.get(), &status) != 0)
+    if (::fstat(from->get(), &status) != 0)
         return SystemError::last(name);
     if (::mkdirat(target.get(), newName.c_str(), S_IRWXU) != 0)
         return SystemError::last(newName);
     const auto to = openSubfolder(target, newName);
     if (!to)
-        return SystemError::last(newName);
-    const auto names = readNames(from);
+        return to.error;
+    const auto names = readNames(*from);
     if (!names)
         return names.error;
     for (const auto& each : *names)
-        TRW_TRY(copyItem(from, each, to, each, level + 1));
-    return finish(from, to, status);
+        TRW_TRY(copyItem(*from, each, *to, each, level + 1));
+    return finish(*from, *to, status);
 }
 
 SystemError copyItem(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
@@ -157,9 +159,9 @@ bool isSameFolder(const Pair& pair, int level)
     const auto a = openSubfolder(pair.folder, pair.name), b = openSubfolder(pair.otherFolder, pair.otherName);
     if (!a || !b || level >= mostLevels)
         return false;
-    const auto names = sortedNames(a), others = names ? sortedNames(b) : std::nullopt;
+    const auto names = sortedNames(*a), others = names ? sortedNames(*b) : std::nullopt;
     return others && *names == *others && std::ranges::all_of(*names, [&](const std::string& name) {
-        return isSameItem({a, name, b, name}, level + 1);
+        return isSameItem({*a, name, *b, name}, level + 1);
     });
 }
 

@@ -31,9 +31,10 @@ public:
     }
     SystemError run(const FileDescriptor& parent, const std::string& name)
     {
-        _current = openSubfolder(parent, name);
-        if (!_current)
-            return SystemError::last(name);
+        auto folder = openSubfolder(parent, name);
+        if (!folder)
+            return folder.error;
+        _current = std::move(*folder);
         TRW_TRY(enter());
         while (!_levels.empty())
             TRW_TRY(_levels.back().subfolders.empty() ? leave() : descend());
@@ -75,11 +76,10 @@ private:
     }
     SystemError descend()
     {
-        const auto& name = _levels.back().subfolders.back();
-        auto below = openSubfolder(_current, name);
+        auto below = openSubfolder(_current, _levels.back().subfolders.back());
         if (!below)
-            return SystemError::last(name);
-        _current = std::move(below);
+            return below.error;
+        _current = std::move(*below);
         return enter();
     }
     SystemError leave()

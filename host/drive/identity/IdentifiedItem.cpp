@@ -52,12 +52,15 @@ std::string pathOf(const FileDescriptor& file)
 SystemResult<IdentifiedItem> IdentifiedItem::open(const DriveLayout& layout, const std::string& path)
 {
     IdentifiedItem item(layout, path);
-    item._file = openBeneath(layout.home(), path, O_PATH);
-    if (!item._file && errno == ENOENT) {
-        item._file = openBeneath(layout.home(), PromiseRecord::pathFor(path), O_RDONLY | O_NONBLOCK);
+    auto file = openBeneath(layout.home(), path, O_PATH);
+    if (file.error.is(ENOENT)) {
+        file = openBeneath(layout.home(), PromiseRecord::pathFor(path), O_RDONLY | O_NONBLOCK);
         item._isPromise = true;
     }
-    if (!item._file || ::fstat(item._file.get(), &item._status) != 0)
+    if (!file)
+        return file.error;
+    item._file = std::move(*file);
+    if (::fstat(item._file.get(), &item._status) != 0)
         return SystemError::last(path);
     if (S_ISLNK(item._status.st_mode))
         return SystemError(ELOOP, path);

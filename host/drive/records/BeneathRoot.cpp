@@ -12,42 +12,47 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
+using host::system::SystemError;
+using host::system::SystemResult;
 
 namespace {
 
-FileDescriptor openResolved(const FileDescriptor& folder, const std::string& path, const open_how& how)
+SystemResult<FileDescriptor> openResolved(
+    const FileDescriptor& folder, const std::string& path, const open_how& how)
 {
     // The kernel answers EAGAIN when something was renamed while it looked; it asks to be asked again.
     for (int tries = 0; tries < 16; ++tries) {
         const auto file = ::syscall(SYS_openat2, folder.get(), path.c_str(), &how, sizeof how);
-        if (file >= 0 || (errno != EAGAIN && errno != EINTR))
+        if (file >= 0)
             return FileDescriptor(static_cast<int>(file));
+        if (errno != EAGAIN && errno != EINTR)
+            break;
     }
-    return {};
+    return SystemError::last(path);
 }
 
 } // namespace
 
-FileDescriptor openBeneath(const std::string& root, const std::string& relativePath, int flags)
+SystemResult<FileDescriptor> openBeneath(const std::string& root, const std::string& relativePath, int flags)
 {
     const FileDescriptor folder(::open(root.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
     if (!folder)
-        return {};
+        return SystemError::last(root);
     open_how how{};
     how.flags = static_cast<std::uint64_t>(flags | O_NOFOLLOW | O_CLOEXEC);
     how.resolve = RESOLVE_BENEATH | RESOLVE_NO_SYMLINKS | RESOLVE_NO_MAGICLINKS;
     return openResolved(folder, relativePath, how);
 }
 
-FileDescriptor openSubfolder(const FileDescriptor& parent, const std::string& name)
+SystemResult<FileDescriptor> openSubfolder(const FileDescriptor& parent, const std::string& name)
 {
     open_how how{};
     how.flags = O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC;
     how.resolve = RESOLVE_BENEATH | RESOLVE_NO_SYMLINKS | RESOLVE_NO_XDEV;
     auto folder = openResolved(parent, name, how);
     // "Another file system" would read as if a copy were called for.
-    if (!folder && errno == EXDEV)
-        errno = EBUSY;
+    if (folder.error.is(EXDEV))
+        return SystemError(EBUSY, name);
     return folder;
 }
 

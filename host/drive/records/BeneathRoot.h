@@ -4,18 +4,20 @@
 #pragma once
 
 #include "host/system/files/FileDescriptor.h"
+#include "host/system/files/SystemError.h"
 
 #include <string>
 
 namespace host::drive {
 
 /// Opens a path below a folder without following any link on the way or at the end; nothing can lead outside.
-/// `flags` are open(2)'s. On failure errno tells why: EXDEV for a way out, ELOOP for a link.
-host::system::FileDescriptor openBeneath(const std::string& root, const std::string& relativePath, int flags);
+/// `flags` are open(2)'s. Errors: EXDEV for a way out, ELOOP for a link.
+host::system::SystemResult<host::system::FileDescriptor> openBeneath(
+    const std::string& root, const std::string& relativePath, int flags);
 
-/// Opens a folder by its name in an open one, for reading its names. Neither a link nor a mount is entered:
-/// on failure errno tells why (EBUSY for a mount).
-host::system::FileDescriptor openSubfolder(
+/// Opens a folder by its name in an open one, for reading its names. Neither a link nor a mount is entered
+/// (ELOOP, EBUSY).
+host::system::SystemResult<host::system::FileDescriptor> openSubfolder(
     const host::system::FileDescriptor& parent, const std::string& name);
 
 /// The path by which the kernel lets one name an open descriptor.
