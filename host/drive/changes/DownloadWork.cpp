@@ -27,7 +27,7 @@ namespace {
 
 constexpr std::int64_t nanosecondsPerSecond = 1'000'000'000;
 
-/// What the promise says beside the content becomes the file's own.
+/// Copies the attributes and the modification date in the promise to the file.
 SystemError mark(const FileDescriptor& file, const PromiseRecord& promise)
 {
     const auto role = !promise.role ? "" : nameOf(*promise.role);
@@ -53,7 +53,7 @@ SystemError mark(const FileDescriptor& file, const PromiseRecord& promise)
     return SystemError::unless(::futimens(file.get(), times) == 0);
 }
 
-/// A download that ends short must not take the place of the document.
+/// A download that ended early must not take the place of the document.
 SystemError checkSize(const FileDescriptor& file, const PromiseRecord& promise)
 {
     struct stat found;
@@ -63,7 +63,8 @@ SystemError checkSize(const FileDescriptor& file, const PromiseRecord& promise)
     return isShort ? SystemError(EIO) : SystemError();
 }
 
-/// One that was deleted or moved away while its content came must not show again where it was.
+/// Removes the promise, or the new document when its promise was meanwhile deleted or moved away: such a
+/// document must not appear in its old place again.
 SystemError settlePromise(const DriveLayout& layout, const DriveEntry& entry, CloudStore& store,
     const platform::ItemVersion& published)
 {
@@ -73,7 +74,8 @@ SystemError settlePromise(const DriveLayout& layout, const DriveEntry& entry, Cl
     }
     if (auto held = HeldItem::take(layout, entry, entry.name)) {
         const auto found = statusAt(held->folder(), held->name());
-        // One that cannot be removed is put back, because a document too many is better than one too few.
+        // A document that cannot be removed is put back, because one document too many is better than one too
+        // few.
         if (found && isSameContent(published, versionOf(*found)))
             static_cast<void>(held->remove(nullptr));
     }
@@ -120,7 +122,7 @@ std::optional<Error> bringHere(const DriveLayout& layout, CloudStore& store, con
     const auto failure = fetchInto(layout, store, item->entry, *promise, progress);
     if (!failure)
         return std::nullopt;
-    // What is missing may be the promise or what it stands for.
+    // Either the promise or its content may be missing.
     if (failure.is(ENOENT) && item->entry.find())
         return missingContent(path);
     return itemError(failure, path);

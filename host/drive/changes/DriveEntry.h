@@ -16,40 +16,41 @@
 
 namespace host::drive {
 
-/// A name in an open folder of the drive. What is done by it stays in that very folder, whatever others do to
-/// the path meanwhile.
+/// A name in an open folder of the drive. Operations on it stay in that very folder, whatever other programs
+/// do to the path meanwhile.
 struct DriveEntry {
     host::system::FileDescriptor folder; ///< opened with O_PATH
     std::string name;
-    std::string path; ///< for errors only
+    std::string path; ///< used in errors only
 
     /// Opens the folder of a path below the documents area without following any link. Errors: EXDEV for a
-    /// path that lies elsewhere or is the area itself, else why the folder cannot be had.
+    /// path outside the area and for the area itself, else the reason why the folder cannot be opened.
     static platform::Result<DriveEntry> open(const DriveLayout& layout, const std::string& path);
 
-    /// What the name is now, a link not followed.
+    /// Answers the status of the name, without following a link.
     host::system::SystemResult<struct stat> status() const;
-    /// The same entry's promise.
+    /// Answers the name of this entry's promise.
     std::string promiseName() const;
-    /// A name on disk and what it is.
+    /// A name on disk and its status.
     struct Found {
         std::string name;
         struct stat status;
     };
-    /// The name on disk that stands for the item, the item's own or its promise's, and what it is now. ENOENT
-    /// when there is neither.
+    /// Finds the name on disk that stands for the item, which is the item's own or its promise's. Answers
+    /// ENOENT when there is neither.
     host::system::SystemResult<Found> find() const;
-    /// EEXIST when an item or a promise has the name already.
+    /// Answers EEXIST when an item or a promise has the name already.
     host::system::SystemError checkIsFree() const;
 };
 
-/// An item that was found: the name on disk that stands for it, and what that was.
+/// An item that was found: the name on disk that stands for it, and the status of that name.
 struct LocatedItem {
     DriveEntry entry;
     std::string name;
     struct stat found { };
 
-    /// Errors: as DriveEntry::open(), and FileErrorCode::NoSuchItem where neither item nor promise lies.
+    /// Finds an item. Errors: those of DriveEntry::open(), and FileErrorCode::NoSuchItem when there is
+    /// neither an item nor a promise.
     static platform::Result<LocatedItem> locate(const DriveLayout& layout, const std::string& path);
     bool isPromise() const { return name != entry.name; }
 };
@@ -57,18 +58,19 @@ struct LocatedItem {
 using host::system::syncFolder;
 using host::system::uniqueName;
 using host::system::versionOf;
-/// Whether both are one item of one content; a rename in between changes no more than the time of change.
+/// Answers whether both are versions of one item with one content. A rename in between changes only the
+/// status change time, which is not compared.
 bool isSameContent(const platform::ItemVersion& a, const platform::ItemVersion& b);
 
-/// What a name in an open folder is, a link not followed.
+/// Answers the status of a name in an open folder, without following a link.
 host::system::SystemResult<struct stat> statusAt(
     const host::system::FileDescriptor& folder, const std::string& name);
-/// Renames without replacing anything (EEXIST).
+/// Renames an item and never replaces one (EEXIST).
 host::system::SystemError renameEntry(const host::system::FileDescriptor& from, const std::string& name,
     const host::system::FileDescriptor& to, const std::string& newName);
-/// Opens a folder of the drive's own, which is made when it is missing and which the user alone may enter.
+/// Opens one of the drive's private folders, and makes it when it is missing. Only the user may enter it.
 host::system::SystemResult<host::system::FileDescriptor> openOwnFolder(const std::string& path);
-/// Whether the process that made such a name (see uniqueName()) is known to be gone.
+/// Answers whether the process that made such a name (see uniqueName()) is known to have ended.
 bool isProcessGone(const std::string& uniqueName);
 
 } // namespace host::drive

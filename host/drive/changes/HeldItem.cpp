@@ -28,7 +28,7 @@ bool isOnOneFileSystem(const FileDescriptor& a, const FileDescriptor& b)
     return ::fstat(a.get(), &first) == 0 && ::fstat(b.get(), &second) == 0 && first.st_dev == second.st_dev;
 }
 
-/// A promise is known by its name, held or not.
+/// A promise stays recognisable by its name while it is held.
 std::string heldName(const std::string& name)
 {
     auto held = uniqueName(WorkRecord::heldPrefix);
@@ -119,8 +119,8 @@ void HeldItem::putBack()
     const auto failure = renameEntry(folder(), _name, _origin, _originName);
     if (!failure)
         return;
-    // Someone saved a new one meanwhile, or the folder is gone: both are kept. Under a name that says that
-    // it is to be removed it would not be.
+    // Another program saved a new item meanwhile, or the folder is gone, so both items are kept. The held one
+    // gets a name without the decision to remove it, because the next start would otherwise remove it.
     if (!_name.starts_with(WorkRecord::heldPrefix)) {
         auto undecided = WorkRecord::heldPrefix + _name.substr(_name.find('-') + 1);
         if (!renameEntry(folder(), _name, folder(), undecided))

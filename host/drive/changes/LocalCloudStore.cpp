@@ -27,7 +27,7 @@ bool isPlainName(const std::string& name)
         && name.find_first_of(std::string_view("/\0", 2)) == std::string::npos;
 }
 
-/// ECANCELED when what was moved into the store is another version by now.
+/// Answers ECANCELED when the file that was moved into the store is another version.
 SystemError checkStored(const FileDescriptor& folder, const std::string& content, const ItemVersion& version)
 {
     const auto stored = statusAt(folder, content);
@@ -91,7 +91,7 @@ SystemError LocalCloudStore::store(
     auto failure = checkStored(*folder, content, version);
     if (!failure)
         failure = syncFolder(*folder);
-    // Where it cannot come back to its name it stays a content.
+    // When the file cannot be given its old name back, it stays in the store as a content.
     if (failure)
         static_cast<void>(renameEntry(*folder, content, document.folder, document.name));
     return failure;
@@ -135,7 +135,7 @@ platform::Result<std::vector<std::string>> LocalCloudStore::listChanges(platform
     const auto reader = std::make_unique<system::DirectoryReader>(*folder);
     while (const auto entry = reader->next()) {
         struct stat found;
-        // A rename into the folder sets the time of change and leaves that of the content.
+        // A rename into the folder sets the status change time and leaves the modification time.
         if (::fstatat(folder->get(), entry->name.data(), &found, AT_SYMLINK_NOFOLLOW) == 0
             && versionOf(found).changed >= since.nanoseconds)
             names.emplace_back(entry->name);

@@ -47,18 +47,21 @@ PromiseRecord promiseFor(const ItemFacts& facts, const std::string& content)
     return promise;
 }
 
-/// What two refusals are called between the steps below; no step of theirs fails with them otherwise.
+/// These two numbers stand for refusals between the steps below. No system call of those steps fails with
+/// them otherwise.
 constexpr int changedMeanwhile = ECANCELED;
 constexpr int ownFolder = EDEADLK;
 
-/// Whether an open folder is one of a tree's, by whatever name it was reached: a mount can give it another.
+/// Answers whether an open folder is one of a tree's. The comparison is by inode, because a mount can give
+/// the folder another path.
 bool holdsFolder(const TreeVersions& tree, const FileDescriptor& folder)
 {
     struct stat found;
     return ::fstat(folder.get(), &found) == 0 && tree.contains({found.st_dev, found.st_ino});
 }
 
-/// Copies an item beside where it is to lie and gives the whole copy its name; answers what was copied.
+/// Copies an item under a temporary name beside its destination and gives the whole copy its name. Answers
+/// the versions that were copied.
 SystemResult<TreeVersions> copyTo(const LocatedItem& source, const DriveEntry& target,
     const std::string& temporary, const std::string& newName)
 {
@@ -75,7 +78,7 @@ Error changeError(const SystemError& failure, const std::string& path)
     return failure.is(changedMeanwhile) ? Error(FileErrorCode::Cancelled) : itemError(failure, path);
 }
 
-/// Makes one folder and notes it, unless it is there already.
+/// Creates one folder, unless it exists already, and notes it.
 std::optional<Error> makeFolder(
     const DriveLayout& layout, const std::string& path, std::vector<DriveEntry>& made)
 {
@@ -125,7 +128,7 @@ std::optional<Error> LocalItemChanges::createFolder(const std::string& path)
         slash = path.find('/', slash + 1);
         error = makeFolder(_layout, path.substr(0, slash), made);
     }
-    // Those on the way that were made for nothing go again, unless somebody uses one by now.
+    // After a failure the new folders are removed again, unless another program uses one by now.
     for (auto entry = made.rbegin(); error && entry != made.rend(); ++entry)
         ::unlinkat(entry->folder.get(), entry->name.c_str(), AT_REMOVEDIR);
     return error;
@@ -181,7 +184,8 @@ std::optional<Error> LocalItemChanges::moveItem(const std::string& from, const s
     auto failure = moveWithin(*source, *target, newName);
     if (failure.is(EXDEV))
         failure = moveAcross(*source, *target, newName);
-    // To the kernel it is an invalid argument when the one name leads through the other by a mount.
+    // The kernel answers EINVAL when the target lies inside the source, which a mount can hide from the
+    // paths.
     if (failure.is(ownFolder) || failure.is(EINVAL))
         return intoItself(from, to);
     if (failure)
@@ -196,7 +200,7 @@ SystemError LocalItemChanges::moveWithin(
     auto failure = syncFolder(target.folder);
     if (!failure)
         failure = syncFolder(source.entry.folder);
-    // A move that might not outlive a power cut is none.
+    // A move that might not survive a power cut counts as failed and is taken back.
     if (failure)
         static_cast<void>(renameEntry(target.folder, newName, source.entry.folder, source.name));
     return failure;
@@ -220,7 +224,7 @@ SystemError LocalItemChanges::moveAcross(
         static_cast<void>(removeTree(target.folder, temporary));
         return copied.error;
     }
-    // From here on the copy is whole and has its name: the worst that can be is that both are there.
+    // From here on the copy is whole and has its name, so at worst both the copy and the original exist.
     auto failure = syncFolder(target.folder);
     if (!failure)
         failure = removeMoved(source, *before, copy);
@@ -231,7 +235,8 @@ SystemError LocalItemChanges::moveAcross(
 
 void LocalItemChanges::withdraw(const DriveEntry& target, const std::string& name, const TreeVersions& copied)
 {
-    // The original is there still. A copy that somebody has changed by now is more than a copy.
+    // The original still exists, so the copy is removed, unless another program has changed it meanwhile:
+    // such a copy holds work that the original lacks.
     auto held = HeldItem::take(_layout, target, name);
     if (!held)
         return;
@@ -274,12 +279,13 @@ SystemError LocalItemChanges::replaceByPromise(const LocatedItem& item)
     if (!file)
         return file.error;
     TRW_TRY(file->write(promise.toJson()));
-    // While both are there the document counts; it goes only when its promise is safe on the disk.
+    // While both exist the document counts. It is removed only when its promise is safe on the disk.
     TRW_TRY(file->publish(entry, entry.promiseName()));
     auto failure = _store->store(entry, versionOf(item.found), content);
     if (failure && entry.status())
         dropRedundantPromise(entry, *_store);
-    // The document's old name needs no sync: come back after a power cut it would hide its promise, no more.
+    // The removal of the document's name needs no sync. If it came back after a power cut, it would only hide
+    // its promise.
     return failure;
 }
 

@@ -13,13 +13,13 @@ namespace host::drive {
 
 class CloudStore;
 
-/// Changes of the drive's items, here or promised. Every step is taken by name in an open folder beneath the
-/// documents area; no link is followed, nothing that is mounted in a folder is entered, and nothing is
-/// replaced. Where a document and a promise lie side by side the document counts: a promise that adds nothing
-/// goes with it, one with another content behind it stays and shows again.
+/// Changes the drive's items, downloaded or promised. Every step acts by name in an open folder beneath the
+/// documents area. It follows no link, enters no mount in a folder, and replaces nothing. When a document and
+/// a promise have the same name, the document counts: a promise that adds nothing is removed with it, and a
+/// promise with another content stays and becomes visible again.
 ///
-/// To another file system an item is moved by a copy under a temporary name, which is compared, synced and
-/// renamed; only then is the original removed, and when that fails the copy is withdrawn.
+/// An item is moved to another file system by a copy under a temporary name, which is compared, synced and
+/// renamed. Only then is the original removed; when that fails, the copy is removed again.
 class LocalItemChanges : public platform::FileChanges {
 public:
     LocalItemChanges(DriveLayout layout, std::shared_ptr<CloudStore> store)

@@ -58,13 +58,13 @@ SystemError NewFile::publish(const DriveEntry& entry, const std::string& name)
         return SystemError::last(_name);
     TRW_TRY(renameEntry(_folder, _name, entry.folder, name));
     auto failure = syncFolder(entry.folder);
-    // It comes back under its private name, and goes with it.
+    // The file is renamed back to its private name and is removed with it.
     if (!failure || renameEntry(entry.folder, name, _folder, _name))
         _name.clear();
     return failure;
 }
 
-/// What lies under this name after a kill is kept: it may be what another program has saved.
+/// The exchanged file under this name is kept after a kill, because it may hold the save of another program.
 SystemError NewFile::takeHeldName(const DriveLayout& layout, const DriveEntry& entry)
 {
     auto held = uniqueName(WorkRecord::heldPrefix);
@@ -112,11 +112,11 @@ SystemResult<ItemVersion> NewFile::replace(
         return SystemError::last(_name);
     TRW_TRY(takeHeldName(layout, entry));
     TRW_TRY(exchange(entry));
-    // Only what was taken out can be looked at without somebody replacing it meanwhile.
+    // The replaced file is checked after the exchange, because only then can no other program replace it.
     auto written = checkExchanged(expected);
     const auto failure = written ? syncFolder(entry.folder) : written.error;
     const bool isKnown = !failure || (!exchange(entry) && isUnderPrivateName());
-    // What could not be looked at or removed is left to the next start.
+    // A file that could not be checked or removed is left to the next start.
     if (!isKnown || ::unlinkat(_folder.get(), _name.c_str(), 0) != 0)
         _record->keep();
     _name.clear();

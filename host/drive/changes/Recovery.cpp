@@ -28,7 +28,7 @@ using host::system::SystemError;
 
 namespace {
 
-/// Where an item of the trash came from.
+/// The attribute with the place from which an item in the trash came.
 constexpr const char* originMark = "user.tarrow.origin";
 
 bool isThere(const DriveEntry& entry)
@@ -36,14 +36,14 @@ bool isThere(const DriveEntry& entry)
     return static_cast<bool>(entry.status());
 }
 
-/// The same private name with another prefix.
+/// Answers the same private name with another prefix.
 DriveEntry renamed(const DriveEntry& entry, const char* prefix)
 {
     return {FileDescriptor(::fcntl(entry.folder.get(), F_DUPFD_CLOEXEC, 0)),
         prefix + entry.name.substr(entry.name.find('-') + 1), entry.path};
 }
 
-/// The document that a promise's name stands for; another name stands for itself.
+/// Answers the path of the document that a promise's name stands for. Any other name stands for itself.
 std::string documentPath(const std::string& path)
 {
     return PromiseRecord::itemPathFor(path).value_or(path);
@@ -99,7 +99,7 @@ SystemError Recovery::finishMove(const WorkRecord::Places& places)
     auto held = HeldItem::take(_layout, *item, item->name, places.copy);
     if (!held)
         return held.error;
-    // What changed between the two looks comes back.
+    // When something changed between the two comparisons, the item is put back.
     if (!isSameTree(held->folder(), held->name(), copy->folder, copy->name))
         return {};
     return held->remove(nullptr);
@@ -109,7 +109,7 @@ bool Recovery::settleHeld(const WorkRecord::Places& places)
 {
     const auto held = entryAt(places.working);
     if (!held)
-        return true; // its folder is gone, and it with it
+        return true; // the item's folder is gone, and the item with it
     const auto gone = renamed(*held, WorkRecord::gonePrefix), moved = renamed(*held, WorkRecord::movedPrefix);
     if (isThere(gone))
         return discard(gone, true);

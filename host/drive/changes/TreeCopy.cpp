@@ -25,7 +25,7 @@ using host::system::SystemResult;
 
 namespace {
 
-// Two descriptors a level, of the usual 1024 for a process.
+// Each level takes two descriptors, of the usual 1024 for a process.
 constexpr int mostLevels = 128;
 constexpr int openFlags = O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY;
 
@@ -44,7 +44,7 @@ SystemResult<std::string> readAttribute(const FileDescriptor& file, const char* 
     return value;
 }
 
-/// Attributes, access and dates, and then to the disk: the last steps of a copy.
+/// Finishes a copy: copies attributes, access rights and dates, and syncs the file.
 SystemError finish(const FileDescriptor& from, const FileDescriptor& to, const struct stat& status)
 {
     TRW_TRY(copyAttributes(from, to));
@@ -136,7 +136,7 @@ SystemError copyItem(const FileDescriptor& folder, const std::string& name, cons
                                    : copyFile(folder, name, target, newName);
 }
 
-/// What is compared: two names in two open folders.
+/// The two names, in two open folders, that are compared.
 struct Pair {
     const FileDescriptor& folder;
     const std::string& name;

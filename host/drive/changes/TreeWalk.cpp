@@ -22,7 +22,7 @@ using host::system::SystemResult;
 
 namespace {
 
-/// Goes through a folder one level at a time, with two descriptors however deep the folders lie.
+/// Walks through a folder one level at a time, with two descriptors however deep the folders lie.
 class Walk {
 public:
     explicit Walk(TreeVisitor& visitor)
@@ -48,7 +48,7 @@ private:
         std::vector<std::string> subfolders;
     };
 
-    /// Visits what is no folder in the current one, and notes the others.
+    /// Visits the items in the current folder and notes its subfolders.
     SystemError enter()
     {
         struct stat self;
@@ -91,7 +91,8 @@ private:
         if (!above)
             return above.error;
         struct stat found;
-        // Whoever moved the folder away took its contents along; its new parent is no business of ours.
+        // When another program moved the folder away, its contents went along, and the walk must not enter
+        // its new parent.
         if (::fstat(above->get(), &found) != 0)
             return SystemError::last("..");
         auto& level = _levels.back();

@@ -16,20 +16,21 @@
 
 namespace host::drive {
 
-/// What a walk through a folder calls. The walk ends with the first failure that one of them answers.
+/// Is called for each item of a walk through a folder. The walk ends with the first error that a call
+/// answers.
 class TreeVisitor {
 public:
     virtual ~TreeVisitor() = default;
-    /// Something that is no folder, a link for instance.
+    /// Visits an item that is not a folder, such as a link.
     virtual system::SystemError visitItem(
         const system::FileDescriptor& folder, const std::string& name, const struct stat& found) = 0;
-    /// A folder that was opened, before what lies in it.
+    /// Visits a folder that was opened, before its contents.
     virtual system::SystemError enterFolder(const system::FileDescriptor& /*folder*/,
         const struct stat& /*self*/, const std::vector<std::string>& /*names*/)
     {
         return {};
     }
-    /// The same folder, after everything in it.
+    /// Visits the same folder after its contents.
     virtual system::SystemError leaveFolder(
         const system::FileDescriptor& /*parent*/, const std::string& /*name*/)
     {
@@ -37,22 +38,22 @@ public:
     }
 };
 
-/// Goes through an item and everything in it, by descriptors, of which it keeps two however deep the folders
-/// lie. No link is followed, and nothing that is mounted in a folder entered (EBUSY). ESTALE when a folder
-/// was moved away under the walk.
+/// Walks through an item and everything in it, with two descriptors however deep the folders lie. It follows
+/// no link and enters no mount in a folder (EBUSY). ESTALE means that another program moved a folder away
+/// during the walk.
 system::SystemError walkTree(
     const system::FileDescriptor& parent, const std::string& name, TreeVisitor& visitor);
 
-/// The names in an open folder. They are read whole, because the folder may change meanwhile.
+/// Answers the names in an open folder. They are read at once, because the folder may change meanwhile.
 system::SystemResult<std::vector<std::string>> readNames(const system::FileDescriptor& folder);
 
-/// Removes a name from an open folder, a folder with everything in it and no link's target. It fails with
-/// what could not be removed; what was removed before that is gone.
+/// Removes a name from an open folder, a folder with everything in it; a link's target stays. An error means
+/// that something could not be removed; what was removed before stays removed.
 system::SystemError removeTree(const system::FileDescriptor& folder, const std::string& name);
 
 /// The versions of an item and of everything in it, by device and inode.
 using TreeVersions = std::map<std::pair<std::uint64_t, std::uint64_t>, platform::ItemVersion>;
-/// Looks at all of them. The item's own time of change is left out, because a rename sets it.
+/// Reads all of these versions. The item's own status change time is left out, because a rename sets it.
 system::SystemResult<TreeVersions> readVersions(
     const system::FileDescriptor& folder, const std::string& name);
 

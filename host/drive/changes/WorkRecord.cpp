@@ -34,11 +34,11 @@ bool lockWhole(const FileDescriptor& file, int command)
 
 std::string textOf(const WorkRecord::Places& places)
 {
-    // The last NUL tells that the text is whole.
+    // The last NUL shows that the text is whole.
     return places.item + '\0' + places.working + '\0' + places.copy + '\0';
 }
 
-/// Empty places for a record that was not written whole: nothing had been done by it then.
+/// Answers empty places for a record that was not written whole, because no work had begun then.
 WorkRecord::Places placesOf(const std::string& text)
 {
     const auto first = text.find('\0'), second = text.find('\0', first + 1);
@@ -101,7 +101,7 @@ void WorkRecord::forEachAbandoned(const DriveLayout& layout, const std::function
         const FileDescriptor file(::open(path.c_str(), O_RDWR | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC));
         if (!file || !lockWhole(file, F_OFD_SETLK))
             continue; // its process still works
-        // One without its text may be a living process's that has not locked it yet.
+        // A record without text may belong to a living process that has not locked it yet.
         const auto text = readSmallFile(file, path, largestRecord);
         const auto places = text ? placesOf(*text) : Places{};
         if (places.working.empty() ? isProcessGone(std::string(entry->name)) : settle(places))

@@ -28,10 +28,10 @@ using Continue = platform::FileSystem::Continue;
 
 namespace {
 
-/// An item that was met, and what tells which of two is the older.
+/// An item that carries the identifier, and its age, by which the older of two items wins.
 struct Candidate {
     DocumentPlace place;
-    std::int64_t born = 0; ///< nanoseconds since 1970; 0 where nobody knows
+    std::int64_t born = 0; ///< nanoseconds since 1970; 0: not known
 };
 
 bool mayCarry(FileType type)
@@ -39,8 +39,8 @@ bool mayCarry(FileType type)
     return type == FileType::Regular || type == FileType::Directory;
 }
 
-/// Whether something is at a path for the time of an operation only: a copy that is not whole, or what is
-/// being removed.
+/// Answers whether the item at a path exists only for the time of an operation: an incomplete copy, or an
+/// item that is being removed.
 bool isInWork(const std::string& path)
 {
     constexpr std::array prefixes{
@@ -75,7 +75,7 @@ std::optional<Candidate> candidateAt(const std::string& path, const std::string&
     return Candidate{{promised.value_or(path).substr(home.size() + 1), status.st_dev, status.st_ino}, born};
 }
 
-/// Of one age, the first by its path: every search answers the same.
+/// Of two items of one age the first by path counts, so that every search answers the same.
 bool isOlder(const Candidate& a, const Candidate& b)
 {
     return a.born != b.born ? a.born < b.born : a.place.path < b.place.path;

@@ -123,7 +123,7 @@ Result<platform::DocumentIdentifiers::OpenFile::Attributes> IdentifiedItem::attr
         return failed(ENOENT);
     if (_isPromise)
         path = PromiseRecord::itemPathFor(path).value_or("");
-    // Nothing is told of what lies elsewhere, not even that it is there.
+    // Nothing is told about items elsewhere, not even that they exist.
     if (!path.starts_with(_layout.documents() + '/'))
         return failed(EXDEV);
     return Attributes{identifier(), platform::Url::fileURL(path)};

@@ -13,26 +13,28 @@
 
 namespace host::drive {
 
-/// An item or its promise, held open while it is asked for its document identifier and its place, so that all
+/// An item or its promise, held open while its document identifier and its place are read, so that all
 /// answers are about one file.
 class IdentifiedItem : public platform::DocumentIdentifiers::OpenFile {
 public:
     /// Opens what is at a path below the drive's home, without following a link: the item, else its promise.
     static system::SystemResult<IdentifiedItem> open(const DriveLayout& layout, const std::string& path);
 
-    /// What it carries; 0 for none, and for a promise that cannot be read.
+    /// Answers the identifier that the item carries; 0 for none, and for a promise that cannot be read.
     std::uint32_t identifier() const;
-    /// Whether it is a file or a folder, or the promise of one: nothing else can carry an identifier.
+    /// Answers whether this is a file or a folder, or the promise of one. Nothing else can carry an
+    /// identifier.
     bool canCarryIdentifier() const;
-    /// Makes it carry another identifier. A promise is replaced by a new file, which this one is not.
+    /// Writes another identifier to the item. A promise is replaced by a new file, and this object stays with
+    /// the old one.
     system::SystemError carry(std::uint32_t identifier) const;
 
     std::uint64_t device() const { return _status.st_dev; }
     std::uint64_t inode() const { return _status.st_ino; }
-    /// Where the item was opened.
+    /// Answers the place where the item was opened.
     DocumentPlace place() const { return {_path, device(), inode()}; }
-    /// Asks the open file; its place is where it lies now. Errors: the system's, ENOENT when it has been
-    /// removed, EXDEV when it was moved out of the documents area.
+    /// Reads the open file; its place is the current one. Errors: ENOENT when the file was removed, EXDEV
+    /// when it was moved out of the documents area, else the system's.
     platform::Result<Attributes> attributes() const override;
 
 private:
@@ -50,8 +52,8 @@ private:
     bool _isPromise = false;
 };
 
-/// The identifier of what lies at an absolute path, an item or a promise; 0 for none. Cheaper than holding it
-/// open, and only a hint: links on the way are followed.
+/// Answers the identifier of the item or promise at an absolute path; 0 for none. It is cheaper than holding
+/// the item open, but only a hint, because links on the way are followed.
 std::uint32_t identifierAt(const std::string& physicalPath);
 
 } // namespace host::drive

@@ -22,8 +22,8 @@ using Kind = DocumentIndex::Answer::Kind;
 
 namespace {
 
-/// One at a time among all threads and processes, until it is closed. Where even the lock cannot be made,
-/// nothing can be written to the index either.
+/// Locks the giving of identifiers among all threads and processes until the file is closed. When even the
+/// lock cannot be made, the index cannot be written either.
 FileDescriptor lockGiving(const DriveLayout& layout)
 {
     static_cast<void>(openOwnFolder(layout.locks()));
@@ -55,7 +55,7 @@ Result<std::uint32_t> LocalDocumentIdentifiers::identifyAt(const std::string& pa
         return itemError(item.error, path);
     if (!item || !item->canCarryIdentifier())
         return platform::Error(platform::FileErrorCode::Unsupported);
-    // Whether another item has the identifier can be told only by an index that knows them all.
+    // Only a complete index can tell whether another item has the identifier.
     if (_index.prepareForWriting() == DocumentIndex::State::Incomplete)
         rebuild();
     if (_index.prepareForWriting() != DocumentIndex::State::Complete)
@@ -77,8 +77,8 @@ bool LocalDocumentIdentifiers::isOwner(
     if (kind == Kind::Known && known.place == place)
         return true;
     if (kind == Kind::Known && known.place.inode != place.inode) {
-        // The document that has it may have been moved or saved anew by others. This item has it only when
-        // no other can be found.
+        // The document with this identifier may have been moved or saved anew by other programs. This item
+        // keeps the identifier only when no other item with it can be found.
         const auto owner = locate(known, Effort::Whole);
         if (owner && owner->inode != place.inode) {
             _index.note(known.identifier, *owner);
@@ -92,7 +92,7 @@ bool LocalDocumentIdentifiers::isOwner(
 Result<std::uint32_t> LocalDocumentIdentifiers::giveIdentifier(const IdentifiedItem& item)
 {
     const auto place = item.place();
-    // First the index, then the item: a crash in between leaves a number that nobody has.
+    // The index is written before the item, so that a crash in between only wastes an identifier.
     const auto identifier = _index.reserve(place);
     if (!identifier)
         return itemError(EAGAIN, place.path);
@@ -100,7 +100,7 @@ Result<std::uint32_t> LocalDocumentIdentifiers::giveIdentifier(const IdentifiedI
         _index.release(*identifier);
         return itemError(failure, place.path);
     }
-    // The promise that carries it is a new file.
+    // The promise that carries the identifier is a new file.
     const auto now = IdentifiedItem::open(_layout, place.path);
     if (now && now->place() != place && now->identifier() == *identifier)
         _index.note(*identifier, now->place());

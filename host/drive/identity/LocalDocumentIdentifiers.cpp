@@ -21,7 +21,7 @@ using Kind = DocumentIndex::Answer::Kind;
 
 namespace {
 
-// What is remembered between two looks at the index; beyond it the memory begins anew.
+// So many items are remembered between two uses of the index. Beyond that the memory is cleared.
 constexpr std::size_t mostRemembered = 4096;
 
 Error failed(int errorNumber)
@@ -29,7 +29,7 @@ Error failed(int errorNumber)
     return {platform::errorDomain::system, errorNumber};
 }
 
-/// What is on disk for an item: itself, else its promise. Answers the path, or nothing.
+/// Answers the path on disk of an item or else of its promise, or nothing.
 std::optional<std::string> physicalPath(const std::string& path, struct stat& status)
 {
     if (::lstat(path.c_str(), &status) == 0)
@@ -84,7 +84,7 @@ Result<platform::DocumentIdentifiers::File> LocalDocumentIdentifiers::resolve(
     if (answer.kind == Kind::Known && isAt(known))
         return File{known.place.inode, known.place.path};
     const auto place = locate(known, effort);
-    // What does not know everything must be made anew, or every look would be a search.
+    // An incomplete index is made anew, because every look-up would otherwise be a search.
     const bool isIncomplete = answer.kind != Kind::Known && _index.state() != DocumentIndex::State::Complete;
     if (isIncomplete || (!place && effort == Effort::Unnoticed))
         searchInBackground(known);
@@ -102,7 +102,8 @@ Result<std::shared_ptr<const platform::DocumentIdentifiers::OpenFile>> LocalDocu
         return failed(ENOENT);
     auto item = IdentifiedItem::open(_layout, file.place);
     if (!item) {
-        // A link may lead to where the document went; then only a search finds its own place.
+        // The path may lead through a link to the document's new place; only a search finds that place
+        // itself.
         for (const auto& known : _index.documentsWithin(file.place))
             searchInBackground(known);
         return failed(item.error.number());
@@ -130,7 +131,8 @@ bool LocalDocumentIdentifiers::isAt(const IdentifiedPlace& known) const
     const auto path = physicalPath(_layout.home() + '/' + known.place.path, status);
     if (!path || status.st_ino != known.place.inode)
         return false;
-    // Another number of the volume may be another volume, where the same inode is another file.
+    // When the device number is another one, this may be another volume on which the same inode is another
+    // file.
     return status.st_dev == known.place.device || identifierAt(*path) == known.identifier;
 }
 
@@ -138,7 +140,7 @@ std::optional<DocumentPlace> LocalDocumentIdentifiers::locate(const IdentifiedPl
 {
     std::optional<DocumentPlace> best;
     if (isPlainRelativePath(known.place.path)) {
-        // It may have been saved by replacing it. It may also be a copy where the document was before.
+        // The document may have been saved by replacing it. A copy may also lie in its old place.
         const auto item = IdentifiedItem::open(_layout, known.place.path);
         if (item && item->identifier() == known.identifier && item->attributes())
             best = item->place();
@@ -180,7 +182,8 @@ void LocalDocumentIdentifiers::rebuild()
     if (_index.state() == DocumentIndex::State::Unavailable)
         return;
     auto all = _finder.findAll();
-    // What the index knows and what is there counts before what is older: a copy may have an older date.
+    // An item that the index knows at its place counts before an older one, because a copy may have an older
+    // date.
     std::erase_if(all, [this](const auto& found) {
         const auto answer = _index.lookUp(found.identifier);
         return answer.kind == Kind::Known && isAt({found.identifier, answer.place});
@@ -238,7 +241,7 @@ void LocalDocumentIdentifiers::moved(const std::string& from, const std::string&
     const auto item = IdentifiedItem::open(_layout, *target);
     const auto identifier = item ? item->identifier() : 0;
     const auto answer = identifier != 0 ? _index.lookUp(identifier) : DocumentIndex::Answer();
-    // A move to another file system makes another file of it.
+    // A move to another file system makes another file of the item.
     if (answer.kind == Kind::Known && answer.place.path == *target && answer.place != item->place())
         _index.note(identifier, item->place());
 }
@@ -253,7 +256,7 @@ std::vector<std::uint32_t> LocalDocumentIdentifiers::documentsWithin(const std::
     std::vector<std::uint32_t> identifiers;
     const auto relative = relativePath(path);
     for (const auto& known : relative ? _index.documentsWithin(*relative) : std::vector<IdentifiedPlace>()) {
-        // One that others moved away is not removed with the folder where it was.
+        // A document that others moved away is not removed with the folder in which it was.
         if (isAt(known))
             identifiers.push_back(known.identifier);
     }

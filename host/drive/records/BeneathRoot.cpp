@@ -20,7 +20,7 @@ namespace {
 SystemResult<FileDescriptor> openResolved(
     const FileDescriptor& folder, const std::string& path, const open_how& how)
 {
-    // The kernel answers EAGAIN when something was renamed while it looked; it asks to be asked again.
+    // The kernel answers EAGAIN when something was renamed during the call, and asks for another try.
     for (int tries = 0; tries < 16; ++tries) {
         const auto file = ::syscall(SYS_openat2, folder.get(), path.c_str(), &how, sizeof how);
         if (file >= 0)
@@ -50,7 +50,7 @@ SystemResult<FileDescriptor> openSubfolder(const FileDescriptor& parent, const s
     how.flags = O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC;
     how.resolve = RESOLVE_BENEATH | RESOLVE_NO_SYMLINKS | RESOLVE_NO_XDEV;
     auto folder = openResolved(parent, name, how);
-    // "Another file system" would read as if a copy were called for.
+    // EXDEV would look as if the item lay on another file system and had to be copied.
     if (folder.error.is(EXDEV))
         return SystemError(EBUSY, name);
     return folder;

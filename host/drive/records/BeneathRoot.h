@@ -10,17 +10,18 @@
 
 namespace host::drive {
 
-/// Opens a path below a folder without following any link on the way or at the end; nothing can lead outside.
-/// `flags` are open(2)'s. Errors: EXDEV for a way out, ELOOP for a link.
+/// Opens a path below a folder without following any link on the way or at the end, so that nothing leads
+/// outside. `flags` are those of open(2). Errors: EXDEV for a path that leads outside, ELOOP for a link, else
+/// the system's.
 host::system::SystemResult<host::system::FileDescriptor> openBeneath(
     const std::string& root, const std::string& relativePath, int flags);
 
-/// Opens a folder by its name in an open one, for reading its names. Neither a link nor a mount is entered
-/// (ELOOP, EBUSY).
+/// Opens a folder by its name in an open folder, to read its names. It enters neither a link (ELOOP) nor a
+/// mount (EBUSY).
 host::system::SystemResult<host::system::FileDescriptor> openSubfolder(
     const host::system::FileDescriptor& parent, const std::string& name);
 
-/// The path by which the kernel lets one name an open descriptor.
+/// Answers the path under which the kernel shows an open descriptor.
 std::string descriptorPath(const host::system::FileDescriptor& descriptor);
 
 } // namespace host::drive

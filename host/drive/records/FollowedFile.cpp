@@ -46,7 +46,7 @@ void FollowedFile::readAgain()
     if (_readingWaits->exchange(true))
         return;
     _queue->async([waits = _readingWaits, read = _read, main = _dispatch->mainQueue()] {
-        // Before the reading, so that a change during it leads to another one.
+        // The flag is cleared before the reading, so that a change during the reading leads to another one.
         waits->store(false);
         main->async(read());
     });

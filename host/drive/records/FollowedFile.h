@@ -13,20 +13,21 @@
 
 namespace host::drive {
 
-/// A small file that is read again whenever it changes, off the main thread. Its folder is watched rather
-/// than the file, so that its creation and its replacement are seen. Main thread.
+/// Follows a small file: reads it again, off the main thread, whenever it changes. The folder is watched and
+/// not the file, so that the file's creation and its replacement are seen. Main thread.
 class FollowedFile : public std::enable_shared_from_this<FollowedFile> {
 public:
-    /// What is done on the main thread with what was read.
+    /// Delivers the result of a reading; called on the main thread.
     using Deliver = std::function<void()>;
-    /// Reads the file, on a queue of its own. It holds no reference to what lives on the main thread.
+    /// Reads the file on a queue of its own, and answers the function that delivers the result. It must hold
+    /// no reference to objects that belong to the main thread.
     using Read = std::function<Deliver()>;
 
     /// Follows the file at a path; `queueName` names the queue.
     static std::shared_ptr<FollowedFile> follow(std::shared_ptr<platform::Dispatch> dispatch,
         std::string path, const std::string& queueName, Read read);
 
-    /// Reads the file as if it had changed. Calls that come while a reading waits are one; a change during a
+    /// Reads the file as after a change. Calls while a reading is waiting count as one, and a change during a
     /// reading leads to another one.
     void readAgain();
 

@@ -83,7 +83,7 @@ void readMark(ItemMarks& marks, const std::string& path, std::string_view name)
 
 bool hasMarks(const struct statx& status)
 {
-    // The system keeps user attributes for files and folders alone.
+    // Linux keeps user attributes only for files and folders.
     return S_ISREG(status.stx_mode) || S_ISDIR(status.stx_mode);
 }
 
@@ -116,7 +116,7 @@ void readPromise(ItemFacts& facts, const std::string& itemPath, int missingReaso
     facts.promisePath = std::move(path);
 }
 
-/// Fills in what is known of a file after its status was asked for, with `failure` as the answer.
+/// Sets the facts of a file from the result of its stat call, whose errno is `failure` (0: none).
 void describeFile(ItemFacts& facts, const std::string& path, int failure)
 {
     if (failure != 0) {

@@ -16,7 +16,7 @@
 
 namespace host::drive {
 
-/// The extended attributes of an item that the drive knows.
+/// The extended attributes of an item that the drive uses.
 struct ItemMarks {
     bool shared = false;
     std::optional<platform::SharedItemRole> role;
@@ -25,12 +25,12 @@ struct ItemMarks {
     std::uint32_t documentIdentifier = 0; ///< 0: none
     std::vector<std::string> tags;
 
-    /// Reads them; what is malformed is as if it were not there. Costs one system call for an item without
-    /// any.
+    /// Reads them; a malformed attribute counts as missing. It costs one system call for an item without
+    /// attributes.
     static ItemMarks read(const std::string& path);
 };
 
-/// Names of the extended attributes; the one that hides the extension is
+/// The names of the extended attributes. The one that hides the extension is
 /// host::system::hiddenExtensionAttribute.
 namespace itemMark {
 inline constexpr const char* shared = "user.tarrow.shared"; ///< "1"
@@ -39,37 +39,38 @@ inline constexpr const char* status = "user.tarrow.status"; ///< "downloaded" or
 inline constexpr const char* documentIdentifier = "user.tarrow.document-id"; ///< decimal
 inline constexpr const char* tags = "user.xdg.tags"; ///< names separated by commas
 } // namespace itemMark
-/// Tags as the text of their attribute.
+/// Answers tags as the text of their attribute.
 std::string joinedTags(const std::vector<std::string>& tags);
 
-/// What one look at a logical location found: the item itself, else its promise.
+/// The result of one look at a logical location: the item itself, else its promise.
 struct ItemFacts {
     enum class Presence : std::uint8_t { Missing, Here, Promised };
 
     Presence presence = Presence::Missing;
-    std::optional<platform::Error> error; ///< why it is missing, or why its promise cannot be used
-    struct statx status { }; ///< of the item that is here
-    PromiseRecord promise; ///< of the one that is promised
-    std::string promisePath; ///< where its promise lies
-    ItemMarks marks; ///< of the item that is here
+    std::optional<platform::Error> error; ///< why the item is missing, or why its promise cannot be used
+    struct statx status { }; ///< of a downloaded item
+    PromiseRecord promise; ///< of a promised item
+    std::string promisePath; ///< the path of the promise
+    ItemMarks marks; ///< of a downloaded item
 
     bool isDirectory() const;
-    /// When the content was last changed; nothing when the promise does not say.
+    /// Answers when the content was last changed, or nothing when the promise does not say it.
     std::optional<platform::Date> modified() const;
 };
 
-/// Looks at a location: the item and its marks, else its promise. A promise that cannot be used is an error,
-/// and one line of the log for each look.
+/// Looks at a location: the item and its extended attributes, else its promise. A promise that cannot be used
+/// is an error, and each look at it logs one line.
 ItemFacts lookAtItem(const std::string& path);
-/// Looks at what lies at a location in the file system; never at a promise.
+/// Looks at the file system's item at a location, never at a promise.
 ItemFacts lookAtFile(const std::string& path);
 
-/// The document identifier that an open item carries; 0 for none. A descriptor opened with O_PATH will do.
+/// Answers the document identifier that an open item carries; 0 for none. The descriptor may be opened with
+/// O_PATH.
 std::uint32_t documentIdentifierOf(const host::system::FileDescriptor& item);
-/// The same of what lies at a path, the last link not followed.
+/// Answers the document identifier of the item at a path, without following a link at its end.
 std::uint32_t documentIdentifierAt(const std::string& path);
 
-/// Whether anything is at a path, links not followed; nothing when it cannot be told.
+/// Answers whether anything exists at a path, without following links, or nothing when that cannot be told.
 std::optional<bool> existsOnDisk(const std::string& path);
 
 } // namespace host::drive

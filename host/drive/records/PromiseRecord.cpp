@@ -27,8 +27,8 @@ PromiseRecord::Kind kindNamed(std::string_view name)
                                : PromiseRecord::Kind::File;
 }
 
-/// Takes a promise's members as the library's parser meets them: reading a promise is part of showing a row,
-/// and a tree of the JSON would cost more than the rest of it.
+/// Takes a promise's members one by one from the library's parser. No tree of the JSON is built, because
+/// reading a promise is part of showing a row and the tree would cost more than all the rest.
 class PromiseReader : public nlohmann::json_sax<json> {
 public:
     PromiseRecord record;
@@ -58,12 +58,12 @@ public:
     {
         return value > INT64_MAX ? isInside() : number_integer(static_cast<std::int64_t>(value));
     }
-    /// What is too large for an integer comes here as well. Nanoseconds in 64 bits reach from 1677 to 2262: a
-    /// year beyond is unknown.
+    /// The parser also calls this for numbers beyond an integer. Nanoseconds in 64 bits reach from 1677 to
+    /// 2262, so a year beyond counts as unknown.
     bool number_float(double, const std::string&) override { return isInside(); }
     bool string(std::string& value) override
     {
-        // A NUL would cut the text short wherever it is handed to the system.
+        // A text with a NUL is refused, because the system would take the part before it for the whole.
         if (!isInside() || value.find('\0') != std::string::npos)
             return false;
         if (isMember("kind"))
@@ -130,7 +130,7 @@ const char* nameOf(SharedItemRole role)
 std::optional<PromiseRecord> PromiseRecord::parse(std::string_view text)
 {
     PromiseReader reader;
-    // The parser takes a NUL for the end of the text, whatever follows it.
+    // The parser would take a NUL for the end of the text, so such a text is refused.
     const bool isWhole =
         text.find('\0') == std::string_view::npos && json::sax_parse(text.begin(), text.end(), &reader);
     return isWhole ? std::optional(std::move(reader.record)) : std::nullopt;

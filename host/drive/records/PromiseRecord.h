@@ -18,10 +18,10 @@ namespace host::drive {
 std::optional<platform::SharedItemRole> roleNamed(std::string_view name);
 const char* nameOf(platform::SharedItemRole role);
 
-/// What a promise says of the item that it stands for. What it does not say, or says in a way that cannot be
-/// right, is unknown.
+/// The attributes that a promise stores for its item. An attribute that is missing or cannot be right is
+/// unknown.
 struct PromiseRecord {
-    /// Largest promise that is read, in bytes.
+    /// Larger promises are not read; bytes.
     static constexpr std::size_t maximumFileSize = 64 * 1024;
     static constexpr std::string_view suffix = system::promiseSuffix;
 
@@ -31,23 +31,24 @@ struct PromiseRecord {
     std::optional<std::uint64_t> size; ///< bytes
     std::optional<platform::Date> created;
     std::optional<platform::Date> modified;
-    std::string type; ///< uniform type identifier; empty: judge by the name
+    std::string type; ///< uniform type identifier; empty: decided by the name
     bool shared = false;
     std::optional<platform::SharedItemRole> role;
     bool extensionHidden = false;
     std::uint32_t documentIdentifier = 0; ///< 0: none
     std::vector<std::string> tags;
-    std::string content; ///< name of the content below the account's cloud folder; empty: not there
+    std::string content; ///< name of the content in the account's cloud folder; empty: there is none
 
     bool operator==(const PromiseRecord&) const = default;
 
-    /// Reads a promise's text. Nothing when it is no single, whole JSON object.
+    /// Parses a promise's text. Answers nothing when it is not a single, whole JSON object.
     static std::optional<PromiseRecord> parse(std::string_view text);
     std::string toJson() const;
 
-    /// The path of the promise of an item: a hidden file beside it.
+    /// Answers the path of an item's promise, which is a hidden file beside it.
     static std::string pathFor(std::string_view itemPath);
-    /// The path of the item that a promise at this path stands for; nothing when the name is no promise's.
+    /// Answers the path of the item for which the promise at this path stands, or nothing when the name is
+    /// not a promise's.
     static std::optional<std::string> itemPathFor(std::string_view promisePath);
 };
 

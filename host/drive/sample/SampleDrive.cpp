@@ -28,7 +28,8 @@ constexpr const char* notebook = "app.tarrow.Notebook";
 constexpr const char* sketchbook = "app.tarrow.Sketchbook";
 constexpr const char* recorder = "app.tarrow.Recorder";
 
-// Tags and the colours of the shared table: 1 grey, 2 green, 3 purple, 4 blue, 5 yellow, 6 red, 7 orange.
+// The tags, and their colours in the shared table: 1 grey, 2 green, 3 purple, 4 blue, 5 yellow, 6 red, 7
+// orange.
 constexpr std::pair<const char*, int> tagTable[] = {{"Important", 6}, {"Travel", 7}, {"Ideas", 5},
     {"Home", 2}, {"University", 4}, {"Family", 3}, {"Archive", 1}, {"Someday", 0}};
 
@@ -37,7 +38,7 @@ SampleWriter::Content text(const char* content)
     return [content] { return std::string(content); };
 }
 
-/// A file of data/sample, which the program carries.
+/// Answers a file of data/sample, which the program contains as a resource.
 SampleWriter::Content file(const char* name)
 {
     return [path = std::string("/app/tarrow/Drive/sample/") + name] {
@@ -68,7 +69,7 @@ std::string numbered(const char* format, int number)
     return name;
 }
 
-/// Writes below one folder.
+/// Writes items below one folder.
 class Folder {
 public:
     Folder(SampleWriter& writer, std::string path)
@@ -295,7 +296,7 @@ Outcome makeSampleDrive(const DriveLayout& wanted)
     fillPhotos(drive.in("Photos"));
     fillLibraries(writer);
     writer.record(layout.keyValueStore(), keyValues());
-    // Last, so that nobody is signed in to a drive that is half made.
+    // The account is written last, so that nobody is signed in to a drive that is half made.
     writer.record(layout.account(), account());
     return {writer.written(), writer.error()};
 }

@@ -65,7 +65,7 @@ void fillCircle(cairo_t* context, double x, double y, double radius)
     cairo_fill(context);
 }
 
-// A range of hills: a sum of waves, so that no two variants look alike.
+// Answers the height of a range of hills, a sum of waves, so that no two variants look alike.
 double hillTop(double x, double width, double height, double base, double swing, int variant)
 {
     const double t = x / width * 2 * M_PI;

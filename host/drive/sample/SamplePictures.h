@@ -7,7 +7,8 @@
 
 namespace host::drive::sample {
 
-/// Drawings for the sample drive; each answers the bytes of a file. `variant` chooses colours and shapes.
+/// These draw pictures for the sample drive; each answers the bytes of a file. `variant` chooses colours and
+/// shapes.
 std::string landscapeJpeg(int variant);
 std::string portraitPng(int variant); ///< a cat on a cushion
 std::string windowShotPng(); ///< a picture of a screen

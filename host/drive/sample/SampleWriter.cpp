@@ -25,13 +25,13 @@ namespace {
 
 std::int64_t secondsDaysAgo(int days)
 {
-    // A time of day that differs from item to item, so that lists by date look like a person's.
+    // The time of day differs from item to item, so that lists by date look like a person's.
     return std::time(nullptr) - days * 86'400LL - (days * 7919) % 40'000;
 }
 
 void setMark(const std::string& path, const char* attribute, const std::string& value)
 {
-    // A file system without extended attributes still makes a usable drive.
+    // On a file system without extended attributes the drive is usable without them.
     ::lsetxattr(path.c_str(), attribute, value.data(), value.size(), 0);
 }
 
@@ -131,7 +131,7 @@ void SampleWriter::promised(const std::string& path, const Content& content, con
     promise.tags = traits.tags;
     promise.extensionHidden = traits.extensionHidden;
     promise.content = contentName(path);
-    // The content first: a promise must never stand for something that is not there.
+    // The content is written first, because a promise must never stand for a content that does not exist.
     record(_layout.cloud() + '/' + promise.content, bytes);
     write(PromiseRecord::pathFor(absolute(path)), promise.toJson());
 }

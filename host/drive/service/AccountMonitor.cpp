@@ -40,7 +40,7 @@ void AccountMonitor::begin(const DriveDependencies& dependencies)
         return platform::weakly(weak, &AccountMonitor::identityRead, currentIdentity(layout));
     };
     _file = FollowedFile::follow(dependencies.dispatch, _layout.account(), "TarrowDriveAppID.account", read);
-    // Read after the watch began, so that no change falls between the two.
+    // The file is read after the watch has begun, so that no change is missed in between.
     _identity = currentIdentity(_layout);
 }
 

@@ -16,17 +16,17 @@
 namespace host::drive {
 
 /// Watches the account's file and posts Notification::CloudIdentityDidChange when another account (or none)
-/// is signed in. A file that is merely written again with the same identity is no change. Main thread; the
-/// file is read on a queue of its own.
+/// is signed in. Writing the file again with the same identity is no change. Main thread; the file is read on
+/// a queue of its own.
 class AccountMonitor : public std::enable_shared_from_this<AccountMonitor> {
 public:
     static std::shared_ptr<AccountMonitor> start(
         const DriveLayout& layout, const DriveDependencies& dependencies);
 
-    /// Called on the main thread after each change of the file, whatever changed in it.
+    /// The handler is called on the main thread after each change of the file, whatever changed in it.
     void onFileChanged(std::function<void()> handler) { _fileChanged = std::move(handler); }
 
-    /// Reads the file and compares, as if it had changed.
+    /// Reads the file and compares the identity, as after a change.
     void check() { _file->readAgain(); }
 
 private:

@@ -13,8 +13,8 @@
 
 namespace host::drive {
 
-/// Keeps the file that tells the account's other devices what this one is doing: written when an activity
-/// becomes current, renewed while it is, removed when it is not. Any thread.
+/// Keeps the file that tells the account's other devices of this one's activity. The file is written when an
+/// activity becomes current, renewed while it is, and removed when it is not. Any thread.
 class ActivityPublication : public std::enable_shared_from_this<ActivityPublication> {
 public:
     using Activity = std::shared_ptr<const platform::UserActivity>;

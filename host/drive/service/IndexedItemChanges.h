@@ -8,7 +8,7 @@
 
 namespace host::drive {
 
-/// Changes of the drive's items that the document index hears of.
+/// Changes the drive's items and tells the document index of each change.
 class IndexedItemChanges : public LocalItemChanges {
 public:
     IndexedItemChanges(const DriveLayout& layout, std::shared_ptr<CloudStore> store,

@@ -81,13 +81,13 @@ bool extensionHidden(const ItemFacts& facts)
     return isPromised(facts) ? facts.promise.extensionHidden : facts.marks.extensionHidden;
 }
 
-// The extensions of the drive's own small files mean nothing to a person.
+// Answers whether an extension is one of the drive's own small files, which means nothing to a person.
 bool standsForAnother(std::string_view extension)
 {
     return extension == system::referenceExtension || extension == system::aliasExtension;
 }
 
-// The extension as Url::pathExtension() has it, without a copy of the name: this is asked for every row.
+// Answers the extension like Url::pathExtension(), without copying the name, because this runs for every row.
 std::string_view extensionOf(const std::string& path)
 {
     const std::string_view name = system::lastName(path);
@@ -97,7 +97,7 @@ std::string_view extensionOf(const std::string& path)
     return name.substr(dot + 1);
 }
 
-// Bytes that are no text become the replacement character; only what is shown is changed.
+// Replaces bytes that are not UTF-8 by the replacement character, for the screen only.
 std::string displayable(std::string name)
 {
     const bool isAscii = std::ranges::all_of(name, [](char c) { return static_cast<signed char>(c) >= 0; });
@@ -127,7 +127,7 @@ void ItemAttributes::fill(
         wantsType = wantsType || key == AttributeKey::TypeIdentifier;
         set(map, key, url, facts, itemKind);
     }
-    // Last, because then the text can be handed over rather than copied.
+    // The type is set last, because its text can then be moved instead of copied.
     if (wantsType)
         map.set(AttributeKey::TypeIdentifier, std::move(itemKind.type));
 }
@@ -163,7 +163,7 @@ bool ItemAttributes::isPicture(const Url& url, const ItemFacts& facts) const
 
 std::optional<std::string> ItemAttributes::description(const std::string& type) const
 {
-    // The one name by which aliases are told from other documents: it is never translated.
+    // The logic recognises aliases by this name, so it is never translated.
     if (type == aliasType)
         return "Alias";
     return _types->description(type);
@@ -232,7 +232,7 @@ void ItemAttributes::set(
         return map.set(key, documentIdentifier(facts));
     case AttributeKey::TypeIdentifier:
     case AttributeKey::ThumbnailMap:
-        return; // set by the callers
+        return; // the callers set it
     }
 }
 

@@ -17,23 +17,23 @@
 
 namespace host::drive {
 
-/// The cloud document service on a folder of this machine. Make and destroy it on the main thread.
+/// The cloud document service for a folder on this machine. Make and destroy it on the main thread.
 class LocalCloudDocumentService : public platform::CloudDocumentService,
                                   public platform::SecurityScopedAccess {
 public:
     struct Settings {
-        std::vector<std::string> languages; ///< for the containers' names, the preferred one first
+        std::vector<std::string> languages; ///< of the containers' names, the preferred language first
         std::string thumbnailFolder = ThumbnailCache::sharedFolder();
     };
 
-    /// Makes the drive's home folder when it is missing, and begins to watch the account.
+    /// Creates the drive's home folder when it is missing, and begins to watch the account.
     static std::shared_ptr<LocalCloudDocumentService> create(
         const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings);
 
     const DriveLayout& layout() const { return _layout; }
-    /// The changes of the drive's items.
+    /// Answers the part that changes the drive's items.
     std::shared_ptr<platform::FileChanges> fileChanges() const { return _itemChanges; }
-    /// The account's storage offer; it follows the same file.
+    /// The account's storage offer, which is read from the account's file as well.
     const std::shared_ptr<LocalStorageOfferManager>& storageOffers() const { return _storageOffers; }
     /// The values that the account's devices share.
     const std::shared_ptr<LocalKeyValueStore>& keyValueStore() const { return _keyValueStore; }
@@ -45,7 +45,7 @@ public:
     platform::DocumentIdentifiers& documentIdentifiers() override { return *_identifiers; }
     platform::SecurityScopedAccess& securityScopedAccess() override { return *this; }
 
-    // Everything of the local store may be used by its user at any time: no leave is needed.
+    // The user may access everything of the local store at any time, so no permission has to be requested.
     bool startAccessing(const platform::Url&) override { return false; }
     void stopAccessing(const platform::Url&) override { }
 

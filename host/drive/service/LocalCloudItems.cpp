@@ -33,7 +33,7 @@ Error unusableBookmark(const char* sentence)
     return cloudError(CloudErrorCode::UnusableBookmark, {}, sentence);
 }
 
-// The document that a bookmark names by its place, unless another document has taken that place.
+// Answers the document that a bookmark names by its place, unless another document has taken that place.
 std::optional<Url> documentAtPlace(const DriveLayout& layout, const Bookmark& bookmark)
 {
     const auto path = layout.containerDocuments(bookmark.container) + '/' + bookmark.path;
@@ -56,13 +56,14 @@ Result<Url> findBookmarked(
     const auto account = AccountRecord::read(layout);
     if (!account || account->identity != bookmark->account)
         return unusableBookmark("The link leads to a document of another account.");
-    // The identifier stays with the document when it is moved, so it counts before the place.
+    // The identifier stays with a document when it is moved, so it counts before the place.
     auto found = identifiers.find(bookmark->documentIdentifier);
     if (!found)
         found = documentAtPlace(layout, *bookmark);
     if (!found)
         return unusableBookmark("The document isn’t in the drive any more.");
-    // One wording for what is not there and for what lies elsewhere: nothing is told of the world outside.
+    // A missing document and one outside the drive get the same sentence, so that nothing is told about files
+    // outside.
     if (!isWithin(*found, layout.documents()))
         return unusableBookmark("The document isn’t in the drive any more.");
     return *found;
@@ -101,7 +102,7 @@ Url LocalCloudItems::realURL(const Url& url) const
     return real && *real != url.path() ? Url::fileURL(*real) : url;
 }
 
-/// What came has another inode than what was promised.
+/// A downloaded document has another inode than its promise, so the index is told.
 LocalCloudItems::Completion LocalCloudItems::identifying(const Url& url, Completion completion) const
 {
     return [identifiers = _identifiers, path = url.path(), completion = std::move(completion)](

@@ -13,7 +13,7 @@ namespace host::drive {
 
 struct Bookmark;
 
-/// Where items of the local store lie.
+/// Finds and downloads items of the local store.
 class LocalCloudItems : public platform::CloudItems {
 public:
     LocalCloudItems(DriveLayout layout, std::shared_ptr<LocalDocumentIdentifiers> identifiers,

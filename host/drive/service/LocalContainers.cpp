@@ -24,7 +24,7 @@ using platform::Result;
 using platform::Url;
 using ContainerPointer = std::shared_ptr<const DocumentContainer>;
 
-// What the drive itself is called where its description does not say.
+// The name of the drive itself when its description has none.
 constexpr const char* defaultContainerName = "Tarrow Drive";
 
 bool isIdentifier(std::string_view name)
@@ -34,7 +34,7 @@ bool isIdentifier(std::string_view name)
 
 using Text = std::unique_ptr<char, decltype(&g_free)>;
 
-// Names in the user's order, without regard to case.
+// Answers a key for the user's order of names, without regard to case.
 std::string sortKey(const std::string& name)
 {
     const Text folded(g_utf8_casefold(name.c_str(), -1), &g_free);
@@ -60,13 +60,13 @@ std::string LocalContainers::defaultContainerIdentifier() const
 std::optional<Url> LocalContainers::defaultContainerURL() const
 {
     struct stat account { };
-    // The account's file decides whether anybody is signed in; what it holds does not matter here.
+    // Somebody is signed in when the account's file exists, whatever it contains.
     if (::stat(_layout.account().c_str(), &account) != 0)
         return std::nullopt;
     return _layout.defaultContainerURL();
 }
 
-// The part of a path below the documents area; empty for a path that is not below it.
+// Answers the part of a path below the documents area; empty for a path outside.
 std::string_view LocalContainers::belowDocuments(const Url& url) const
 {
     const std::string_view path = url.path();
@@ -123,7 +123,8 @@ ContainerPointer LocalContainers::containerWithIdentifier(const std::string& ide
 
 bool LocalContainers::canMoveWithoutDownloading(const DocumentContainer&, const DocumentContainer&) const
 {
-    // All containers of the local store share one file system and one cloud: promises move as they are.
+    // All containers of the local store share one file system and one cloud, so promises can be moved between
+    // them unchanged.
     return true;
 }
 
@@ -131,7 +132,8 @@ std::optional<platform::Error> LocalContainers::deleteContents(const DocumentCon
 {
     if (container.identifier == DriveLayout::defaultContainerIdentifier)
         return platform::Error(platform::FileErrorCode::Unsupported);
-    // Its description stays: an app that makes documents again finds its library as it was.
+    // The container's description is kept, so that an app that makes documents again finds its library as it
+    // was.
     return _changes->removeItem(_layout.container(container.identifier), std::nullopt);
 }
 

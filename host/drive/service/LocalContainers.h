@@ -14,12 +14,12 @@
 
 namespace host::drive {
 
-/// The containers of the local store: the folders of the documents area, described by small files that are
-/// read again when they change. A container whose description is damaged or missing goes by its folder's
+/// The containers of the local store, which are the folders of the documents area. Small files describe them
+/// and are read again when they change. A container whose description is damaged or missing has its folder's
 /// name.
 class LocalContainers : public platform::DocumentContainers {
 public:
-    /// `languages`: the user's, the preferred one first ("de_DE", "de", ...).
+    /// `languages` are the user's, the preferred one first ("de_DE", "de", ...).
     LocalContainers(DriveLayout layout, std::vector<std::string> languages,
         std::shared_ptr<platform::FileChanges> changes);
 
@@ -38,7 +38,7 @@ public:
     std::vector<std::shared_ptr<const platform::DocumentContainer>> allContainers() const override;
 
 private:
-    /// What tells one version of a description from another.
+    /// The attributes that tell one version of a description from another.
     struct Signature {
         std::uint64_t inode = 0, size = 0;
         std::int64_t modified = 0;

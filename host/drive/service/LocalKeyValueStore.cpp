@@ -116,7 +116,7 @@ std::optional<PropertyValue> LocalKeyValueStore::objectForKey(const std::string&
 {
     const std::lock_guard lock(_mutex);
     if (!_values) {
-        *_isWanted = true; // before the reading, so that no change falls between the two
+        *_isWanted = true; // set before the reading, so that no change is missed in between
         _values = readValues(_layout.keyValueStore());
     }
     const auto* value = find(*_values, key);

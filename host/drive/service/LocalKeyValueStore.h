@@ -15,13 +15,12 @@
 
 namespace host::drive {
 
-/// The account's key-value store, a JSON object in a file that is watched. A file that cannot be used is
-/// named in one log line for each time it changes, and is as if it were not there. Make and destroy it on the
-/// main thread.
+/// The account's key-value store, a JSON object in a file that is watched. A file that cannot be used counts
+/// as missing, and one line is logged for each change of it. Make and destroy it on the main thread.
 class LocalKeyValueStore : public platform::KeyValueStore,
                            public std::enable_shared_from_this<LocalKeyValueStore> {
 public:
-    /// Largest file that is read, in bytes.
+    /// Larger files are not read; bytes.
     static constexpr std::size_t maximumFileSize = 1024 * 1024;
 
     static std::shared_ptr<LocalKeyValueStore> create(
@@ -39,10 +38,10 @@ private:
     DriveLayout _layout;
     std::shared_ptr<platform::NotificationCenter> _notifications;
     std::shared_ptr<FollowedFile> _file;
-    /// Whether anybody has asked for a value yet: until then the file is not read.
+    /// Says whether a value was ever asked for. The file is not read before that.
     const std::shared_ptr<std::atomic_bool> _isWanted = std::make_shared<std::atomic_bool>(false);
     mutable std::mutex _mutex;
-    mutable std::optional<platform::PropertyDictionary> _values; ///< nothing before the first reading
+    mutable std::optional<platform::PropertyDictionary> _values; ///< absent before the first reading
 };
 
 } // namespace host::drive

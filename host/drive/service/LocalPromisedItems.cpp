@@ -41,7 +41,7 @@ LocalPromisedItems::LocalPromisedItems(DriveLayout layout, ItemAttributes attrib
 
 std::optional<Error> LocalPromisedItems::checkPromisedItemIsReachable(const Url& url) const
 {
-    // A promise that cannot be used is still there.
+    // A promise exists even when it cannot be used.
     auto facts = lookAtItem(url.path());
     return facts.presence == ItemFacts::Presence::Missing ? std::move(facts.error) : std::nullopt;
 }
@@ -65,7 +65,7 @@ platform::ItemReading LocalPromisedItems::readItem(const Url& url, platform::Att
         return reading;
     }
     fill(reading.values.value.emplace(), url, facts, keys);
-    // Rows are read again when their folder changes: what others moved is noticed here.
+    // Rows are read again when their folder changes, so moves by other programs are noticed here.
     if (const auto identifier =
             isPromised ? facts.promise.documentIdentifier : facts.marks.documentIdentifier)
         _identifiers->seen(identifier, url.path());

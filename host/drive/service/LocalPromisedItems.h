@@ -14,9 +14,9 @@ namespace host::drive {
 class LocalDocumentIdentifiers;
 class ThumbnailCache;
 
-/// Items of the local store: real files, and hidden promise files beside where the item would be. Where both
-/// exist the real file counts. A promise's name says where it belongs; names inside it are never used as
-/// paths.
+/// The items of the local store: real files, and hidden promise files beside the items' places. When both
+/// exist the real file counts. A promise's file name says to which item it belongs; names inside the promise
+/// are never used as paths.
 class LocalPromisedItems : public platform::PromisedItems {
 public:
     LocalPromisedItems(DriveLayout layout, ItemAttributes attributes,
