@@ -27,7 +27,7 @@ void FolderWatches::release(int watch)
 std::vector<Inotify::Event> FolderWatches::take()
 {
     auto events = _inotify->take();
-    // The kernel has ended such a watch itself, and never uses its number again.
+    // The kernel has ended such a watch by itself and never uses its number again.
     for (const auto& event : events) {
         if (event.mask & IN_IGNORED)
             _holders.erase(event.watch);

@@ -11,7 +11,7 @@
 
 namespace host::system {
 
-/// Watches of folders that several may hold at once: a folder is watched as long as one of them holds it.
+/// Watches of folders that several holders share. A folder is watched as long as one of them holds it.
 class FolderWatches {
 public:
     explicit FolderWatches(std::unique_ptr<Inotify> inotify)
@@ -19,11 +19,11 @@ public:
     {
     }
 
-    /// One more holder. Answers the watch; errors as Inotify::watch().
+    /// Adds a holder and answers the watch. The errors are those of Inotify::watch().
     SystemResult<int> hold(const std::string& folder);
-    /// One holder less; -1 is nobody's watch.
+    /// Removes a holder. A watch of -1 is ignored.
     void release(int watch);
-    /// What happened in the watched folders since the last call.
+    /// Answers the events in the watched folders since the last call.
     std::vector<Inotify::Event> take();
 
 private:

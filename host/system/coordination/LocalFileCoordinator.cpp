@@ -22,11 +22,11 @@ using Claims = std::vector<LockFile::Claim>;
 
 namespace {
 
-/// What the current thread has, over all coordinators: the locks of two open files exclude each other even in
-/// one thread, so what is had already is not asked for again.
+/// The claims of the current thread in all coordinators. A thread does not ask for a lock that it holds
+/// already, because the locks of two open files exclude each other even in one thread.
 thread_local Claims claimsOfThread;
 
-/// Keeps claims entered as the thread's.
+/// Adds claims to the thread's for the time of a scope.
 class EnteredClaims {
 public:
     explicit EnteredClaims(const Claims& claims)
@@ -50,7 +50,7 @@ bool isCovered(const LockFile::Claim& claim)
     });
 }
 
-/// Whether the thread would wait for itself: its own lock is in the way.
+/// Answers whether the thread would wait for a lock of its own.
 bool isBlocked(const LockFile::Claim& claim)
 {
     return claim.mode == LockMode::Exclusive && std::ranges::any_of(claimsOfThread, [&](const auto& had) {
@@ -58,7 +58,7 @@ bool isBlocked(const LockFile::Claim& claim)
     });
 }
 
-/// The moves that were announced in the current write of this thread and did not happen yet.
+/// The moves that were announced in the current write of this thread and have not happened yet.
 thread_local std::vector<std::string> announcedMoves;
 
 } // namespace
@@ -95,7 +95,7 @@ std::optional<Error> LocalFileCoordinator::coordinateReading(
         isRead = true;
         accessor(url);
     });
-    // Where not even the lock file can be written nobody writes, and there is nothing to wait for.
+    // When not even the lock file can be written, nobody writes, and there is nothing to wait for.
     if (error && !isRead && (error->code() == EROFS || error->code() == EACCES)) {
         accessor(url);
         return std::nullopt;
@@ -141,7 +141,7 @@ std::optional<Error> LocalFileCoordinator::write(
     return error;
 }
 
-/// Runs a write that this process's presenters hear of otherwise than by the watch.
+/// Runs a write. The watch does not report it, because this process tells its presenters itself.
 void LocalFileCoordinator::runWatched(std::span<const Target> targets, const std::function<void()>& body)
 {
     if (!_watch)
@@ -160,7 +160,7 @@ void LocalFileCoordinator::tellAfterwards(const Target& target)
     const bool wasOnlyAnnounced = std::erase(announcedMoves, url.path()) > 0;
     const bool isMoveDone = target.options == WritingOptions::ForMoving && !wasOnlyAnnounced;
     const bool isGone = target.options == WritingOptions::ForDeleting && !isItemThere(url.path());
-    // Whoever presents the item itself has heard of the move or of the deletion; its folder changed.
+    // The item's own presenters have been told of the move or the deletion, so only the folder has changed.
     if (isMoveDone || isGone)
         _notices->tellOfChange(url.deletingLastPathComponent());
     else

@@ -18,7 +18,8 @@ namespace host::system {
 
 namespace {
 
-// FNV-1a: the same in every process and every build. Two paths that meet only exclude each other needlessly.
+// This is FNV-1a, which is the same in every process and every build. Two paths with one hash merely exclude
+// each other without need.
 std::int64_t byteOf(std::string_view path)
 {
     std::uint64_t hash = 0xcbf29ce484222325U;
@@ -29,15 +30,15 @@ std::int64_t byteOf(std::string_view path)
 
 using Clock = std::chrono::steady_clock;
 
-/// The pauses of one wait. The kernel's own wait has no end when the holder hangs, so the lock is asked for
-/// again and again: at once as long as a short holder may be running, then less and less often.
+/// The pauses of one wait. The kernel's own wait would never end when the holder hangs, so the lock is tried
+/// again and again: at once while a short holder may be running, then less and less often.
 class Pauses {
 public:
     explicit Pauses(platform::Duration patience)
         : _end(Clock::now() + patience)
     {
     }
-    /// False when there is no time left.
+    /// Answers false when the time is over.
     bool next()
     {
         if (Clock::now() >= _end)

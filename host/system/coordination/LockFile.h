@@ -17,12 +17,13 @@ namespace host::system {
 
 enum class LockMode : std::uint8_t { Shared, Exclusive };
 
-/// Readers and writers of paths, between threads and between processes that use the same lock file.
+/// Locks paths for readers and writers, between threads and between processes that use the same lock file.
 ///
-/// Every path has one byte of the file, which holds nothing. Whoever has a path shares the bytes of the
-/// folders above it, so a writer of a folder has everything below it. The locks belong to an open file of
-/// their own: they go when it is closed, also by the kernel after a process was killed. Each set is taken in
-/// the order of the bytes, which is the same for everyone: no two sets wait for each other.
+/// Every path has one byte of the file, which stays empty. The holder of a path also shares the bytes of the
+/// folders above it, so a writer of a folder excludes everything below it. The locks belong to an open file
+/// description of their own, so they end when it is closed, also by the kernel after a process was killed.
+/// Each set is locked in the order of the bytes, which is the same for everyone, so no two sets wait for each
+/// other.
 class LockFile {
 public:
     struct Claim {
@@ -30,13 +31,13 @@ public:
         LockMode mode;
     };
 
-    /// `path` empty: a file without a name, for this process alone. The file and its folder are made when
-    /// they are missing.
+    /// An empty `path` means a file without a name, for this process alone. The file and its folder are made
+    /// when they are missing.
     explicit LockFile(std::string path);
 
-    /// Waits until all claims can be had, but no longer than `patience` in all. Answers the open file that
-    /// holds the locks until it is closed. Errors: EBUSY when someone else kept them all that time, EROFS or
-    /// EACCES when the file cannot be written.
+    /// Waits until all claims can be locked, but no longer than `patience` in all. Answers the open file that
+    /// holds the locks until it is closed. Errors: EBUSY when another holder kept them all that time, EROFS
+    /// or EACCES when the file cannot be written.
     SystemResult<FileDescriptor> acquire(const std::vector<Claim>& claims, platform::Duration patience) const;
 
 private:

@@ -53,7 +53,8 @@ std::optional<std::string> PresentedItem::whereabouts() const
         return std::nullopt;
     const std::string path(buffer.data(), static_cast<std::size_t>(length));
     const auto name = itemName(lastName(path));
-    // What was removed is named too, with a remark at the end that could be part of a name.
+    // The kernel names a removed file too, with a remark at the end that could be part of a name, so the file
+    // is checked.
     struct stat status;
     if (isPassingName(name) || ::lstat(path.c_str(), &status) != 0 || status.st_dev != _version.device
         || status.st_ino != _version.inode)

@@ -11,15 +11,15 @@
 
 namespace host::system {
 
-/// One item as it was seen last, here or promised. It is held by an open descriptor that reads nothing, so
-/// that it is found again wherever on its storage it was moved.
+/// One item, here or promised, as of the last look. It is held by a descriptor that reads nothing, so that
+/// the item can be found wherever on its file system it was moved.
 class PresentedItem {
 public:
     enum class Finding {
-        Same, ///< unchanged; or still missing; or it cannot be looked at now
-        Changed, ///< written, replaced, downloaded, evicted, or there again
-        Moved, ///< its place is empty, and it is elsewhere
-        Gone, ///< its place is empty, and it was removed
+        Same, ///< unchanged, still missing, or not accessible now
+        Changed, ///< written, replaced, downloaded, evicted, or back again
+        Moved, ///< its place is empty, and the item is elsewhere
+        Gone, ///< its place is empty, and the item was removed
     };
 
     explicit PresentedItem(std::string path)
@@ -31,14 +31,14 @@ public:
     bool isFolder() const { return _isFolder; }
     bool isKnown() const { return static_cast<bool>(_file); }
 
-    /// Looks at the item's place. What is there is known from then on.
+    /// Looks at the item's place. The item that is there is known from then on.
     Finding look();
-    /// Where the known item is now, the item's own name for a promise; nothing when it was removed or is
-    /// being removed.
+    /// Answers the current path of the known item, for a promise the path of its item, or nothing when it was
+    /// removed or is being removed.
     std::optional<std::string> whereabouts() const;
-    /// It belongs there from now on.
+    /// Says that the item belongs to another place from now on.
     void setPath(std::string path) { _path = std::move(path); }
-    /// It was removed; nothing is known any more.
+    /// Says that the item was removed, so nothing is known any more.
     void forget();
 
 private:

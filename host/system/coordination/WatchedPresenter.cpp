@@ -22,7 +22,7 @@ using Finding = PresentedItem::Finding;
 
 namespace {
 
-// Whoever removes more at once removes everything: the folder's own change says it.
+// When more names than this vanish at once, only the change of the folder itself is reported.
 constexpr std::size_t mostVanishedTold = 64;
 
 std::pair<std::uint64_t, std::uint64_t> identityOf(const std::string& path)
@@ -33,7 +33,8 @@ std::pair<std::uint64_t, std::uint64_t> identityOf(const std::string& path)
         : std::pair<std::uint64_t, std::uint64_t>();
 }
 
-/// The kernel names where a file really is; the drive may be shown by way of a link.
+/// Answers a path by way of the drive's root. The kernel names the real path of a file, but the root may be a
+/// link.
 std::string pathOnDrive(const std::string& realPath, const std::string& root)
 {
     const std::unique_ptr<char, decltype(&std::free)> resolved(::realpath(root.c_str(), nullptr), &std::free);
@@ -72,7 +73,7 @@ int WatchedPresenter::hold(FolderWatches& watches, const std::string& folder)
     const auto watch = watches.hold(folder);
     if (watch)
         return *watch;
-    // A folder that is not there is noticed in the folder above it.
+    // A folder that does not exist is noticed in the folder above it.
     _isBlind |= !watch.error.is(ENOENT) && !watch.error.is(ENOTDIR);
     return -1;
 }
@@ -93,7 +94,7 @@ void WatchedPresenter::link(FolderWatches& watches)
     }
     if (_item.isFolder())
         _inside = hold(watches, _item.path());
-    // Only now, so that what stays watched is watched all the time.
+    // The former watches are released only now, so that a folder that stays watched is watched without a gap.
     for (const auto& held : former)
         watches.release(held.watch);
     watches.release(formerInside);
@@ -120,7 +121,7 @@ void WatchedPresenter::mark(const Inotify::Event& event, const IsOwn& isOwn)
 {
     if (event.mask & IN_Q_OVERFLOW)
         return markMissed();
-    if (event.mask & IN_MOVED_TO) // it did not leave what is watched
+    if (event.mask & IN_MOVED_TO) // the item stays within the watched folders
         std::erase_if(_vanished, [&](const auto& each) { return each.second == event.cookie; });
     for (auto& each : _links) {
         if (each.watch != event.watch)
@@ -160,10 +161,10 @@ void WatchedPresenter::look(FolderWatches& watches, std::vector<Notice>& notices
     _wasMissing = false;
     tellPresent(finding == Finding::Changed, notices);
     if (finding == Finding::Changed)
-        link(watches); // what is there now may be another folder
+        link(watches); // another folder may be in its place now
 }
 
-/// Whether the drive itself is there: a drive that was taken off has deleted nothing.
+/// Answers whether the drive itself exists, because a drive that was taken off has deleted nothing.
 bool WatchedPresenter::isOnDrive() const
 {
     return !isPathWithin(_item.path(), _root) || identityOf(_root) == _rootIdentity;
@@ -188,7 +189,7 @@ void WatchedPresenter::tellMissing(FolderWatches& watches, std::vector<Notice>& 
     } else {
         _item.forget();
         notices.emplace_back([presenter = _presenter](auto& told) {
-            // It is too late to refuse, and nobody waits.
+            // It is too late to refuse the deletion, and nobody waits for the answer.
             told.tell(presenter,
                 [](auto& each) { each.accommodatePresentedItemDeletionWithCompletionHandler([](auto&) {}); });
         });

@@ -23,50 +23,52 @@ namespace host::system {
 
 class PresenterNotices;
 
-/// One presenter and what is watched for it: its item's folder, the folders above that one up to the drive,
-/// and a presented folder itself. Events only mark it; a look at the disk then decides what is told.
+/// One presenter and the folders that are watched for it: its item's folder, the folders above that one up to
+/// the drive, and a presented folder itself. Events only mark the presenter; a look at the disk then decides
+/// what it is told.
 class WatchedPresenter {
 public:
-    /// What a presenter is to be told, once nothing of ours is locked.
+    /// A call to a presenter, which runs when none of our locks is held.
     using Notice = std::function<void(PresenterNotices&)>;
-    /// Whether a path is being written by this process, which tells its presenters itself.
+    /// Answers whether this process is writing a path, because it then tells its presenters itself.
     using IsOwn = std::function<bool(const std::string& path)>;
 
-    /// `root` is the drive's documents area; nothing above it moves an item.
+    /// `root` is the drive's documents area. Nothing above it moves an item.
     WatchedPresenter(std::weak_ptr<platform::FilePresenter> presenter, std::string path, std::string root);
 
     const std::weak_ptr<platform::FilePresenter>& presenter() const { return _presenter; }
     const PresentedItem& item() const { return _item; }
-    /// What the presenter answered when it was asked last; it may lag behind where the item is.
+    /// The path that the presenter answered last. It may be older than the item's place.
     const std::string& askedPath() const { return _askedPath; }
     void setAskedPath(std::string path) { _askedPath = std::move(path); }
     bool isDue() const { return _isDue; }
-    /// Whether a folder could not be watched, so that changes must be looked for.
+    /// Answers whether a folder could not be watched, so that changes must be polled for.
     bool isBlind() const { return _isBlind; }
 
-    /// Begins to watch, and takes what is there as known.
+    /// Begins to watch, and takes the current state as known.
     void start(FolderWatches& watches);
     void stop(FolderWatches& watches);
     void mark(const Inotify::Event& event, const IsOwn& isOwn);
     void markDue() { _isDue = true; }
 
-    /// Looks at the item and adds what its presenter is to be told. One that is missing is told of at the
-    /// second look, so that a program which saves in several steps is through with them.
+    /// Looks at the item and adds the notices for its presenter. A missing item is reported at the second
+    /// look, so that a program that saves in several steps has finished them.
     void look(FolderWatches& watches, std::vector<Notice>& notices);
 
     enum class Ending { MayBeThere, WasDeleted };
-    /// A write of this process ended, of which the presenter hears otherwise: what is there is known.
+    /// A write of this process has ended, of which the presenter is told otherwise, so the current state is
+    /// taken as known.
     void absorb(FolderWatches& watches, Ending ending);
-    /// The item was moved by this process.
+    /// This process moved the item.
     void follow(std::string path) { _item.setPath(std::move(path)); }
 
 private:
     struct Link {
         int watch;
-        std::string name; ///< the one in the watched folder that leads to the item
+        std::string name; ///< the name in the watched folder that leads to the item
     };
     void link(FolderWatches& watches);
-    /// The watch of a folder, or -1.
+    /// Answers the watch of a folder, or -1.
     int hold(FolderWatches& watches, const std::string& folder);
     PresentedItem::Finding see();
     void markMissed();
@@ -81,8 +83,8 @@ private:
     std::pair<std::uint64_t, std::uint64_t> _rootIdentity; ///< device and inode
     std::vector<Link> _links; ///< the item's own folder first
     int _inside = -1; ///< the watch of a presented folder
-    std::set<std::string> _appeared; ///< names that came into it since the last look
-    std::map<std::string, std::uint32_t> _vanished; ///< names that left it, with the cookie of a move
+    std::set<std::string> _appeared; ///< names that appeared in the folder since the last look
+    std::map<std::string, std::uint32_t> _vanished; ///< names that left the folder, with the cookie of a move
     bool _isDue = false, _isBlind = false, _isInsideChanged = false, _wasMissing = false;
 };
 

@@ -44,7 +44,7 @@ GLogLevelFlags glibLevel(LogLevel level)
 
 const char* journalPriority(LogLevel level)
 {
-    static constexpr const char* priorities[] = {"7", "6", "4", "3"}; // as in syslog(3)
+    static constexpr const char* priorities[] = {"7", "6", "4", "3"}; // the numbers of syslog(3)
     return priorities[static_cast<int>(level)];
 }
 

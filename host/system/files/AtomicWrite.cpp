@@ -25,7 +25,7 @@ FileDescriptor openParent(const std::string& path)
     return FileDescriptor(::open(parentPath(path).c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
 }
 
-/// The access that the file under the name gives now.
+/// Answers the access rights of the present file under the name.
 mode_t modeToKeep(const FileDescriptor& folder, const std::string& name)
 {
     struct stat found;
@@ -34,8 +34,8 @@ mode_t modeToKeep(const FileDescriptor& folder, const std::string& name)
 }
 
 enum class Purpose {
-    Replace, ///< a content that must not be lost, in place of what has the name
-    Make, ///< a new file, which can be made again
+    Replace, ///< replaces an existing file; the content must not be lost
+    Make, ///< makes a new file, which could be made again
 };
 
 /// Writes the whole content under the temporary name.
@@ -106,7 +106,7 @@ SystemError writeWhole(const FileDescriptor& file, std::string_view content)
 
 SystemError syncFolder(const FileDescriptor& folder)
 {
-    // fsync refuses descriptors that only name a folder, so it is opened anew.
+    // fsync refuses descriptors that were opened with O_PATH, so the folder is opened again.
     const FileDescriptor readable(::openat(folder.get(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC));
     return SystemError::unless(readable && ::fsync(readable.get()) == 0);
 }
@@ -133,7 +133,7 @@ platform::Result<std::string> readWholeFile(const std::string& path, std::size_t
 platform::Result<std::string> readWholeFile(
     const FileDescriptor& folder, const std::string& name, std::size_t maximumBytes, std::string_view path)
 {
-    // Without O_NONBLOCK a named pipe under the name would hold the caller until someone writes to it.
+    // Without O_NONBLOCK, opening a named pipe would block until another program writes to it.
     constexpr int flags = O_RDONLY | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY;
     const FileDescriptor file(::openat(folder.get(), name.c_str(), flags));
     struct stat found;

@@ -13,29 +13,29 @@
 
 namespace host::system {
 
-/// Writes a file so that at every moment, a crash and a full disk included, its name holds the old content or
-/// the new: a temporary file in the same folder, synced, renamed over the name, the folder synced. What was
-/// under the name is replaced. A new file can be read by the user alone; one that was there keeps its mode.
-/// Answers why it failed, the old content then being untouched. Any thread; waits for the disk.
+/// Writes a file so that at every moment, even in a crash or on a full disk, its name stands for the old
+/// content or the new one: it writes a temporary file in the same folder, syncs it, renames it over the name
+/// and syncs the folder. An existing file is replaced and its mode is kept; a new file can be read by the
+/// user alone. Answers the error; the old content is then untouched. Any thread; it waits for the disk.
 std::optional<platform::Error> writeFileAtomically(const std::string& path, std::string_view content);
 
-/// The same for a name in an open folder; `path` is only for the error.
+/// Writes a name in an open folder; `path` is used in the error only.
 std::optional<platform::Error> writeFileAtomically(
     const FileDescriptor& folder, const std::string& name, std::string_view content, std::string_view path);
 
-/// Writes a file that is new, whole or not at all: what has the name already stays
-/// (FileErrorCode::ItemExists). It is for what can be made again, because it does not wait for the disk.
+/// Writes a new file, whole or not at all. It never replaces a file (FileErrorCode::ItemExists). It is for
+/// content that could be made again, because it does not wait for the disk.
 std::optional<platform::Error> writeNewFileAtomically(const std::string& path, std::string_view content);
 
-/// The steps of such a write, for those who take them one by one.
+/// These are the steps of such a write, for callers that take them one by one.
 SystemError writeWhole(const FileDescriptor& file, std::string_view content);
-/// Brings a folder's names to the disk; a descriptor opened with O_PATH will do.
+/// Syncs a folder, so that its names survive a power cut. The descriptor may be opened with O_PATH.
 SystemError syncFolder(const FileDescriptor& folder);
-/// A name that nothing has yet in any folder: a prefix, the process, the time, a number.
+/// Answers a name that no folder has yet: a prefix, the process, the time and a number.
 std::string uniqueName(std::string_view prefix);
 
-/// A whole file of at most `maximumBytes` (EFBIG otherwise). Nothing but regular files is opened, and no link
-/// followed (ELOOP).
+/// Reads a whole file of at most `maximumBytes` (else EFBIG). It opens only regular files and follows no link
+/// (ELOOP).
 platform::Result<std::string> readWholeFile(const std::string& path, std::size_t maximumBytes);
 platform::Result<std::string> readWholeFile(
     const FileDescriptor& folder, const std::string& name, std::size_t maximumBytes, std::string_view path);

@@ -22,7 +22,7 @@ std::string encoded(const void* bytes, std::size_t length)
     return text.get();
 }
 
-/// A text or bytes; nothing where the text is not what encoded() makes of them.
+/// Decodes a text. Answers nothing when encoding the result does not give the same text.
 template <typename Bytes>
 std::optional<Bytes> decoded(const std::string& text)
 {
@@ -32,7 +32,8 @@ std::optional<Bytes> decoded(const std::string& text)
     bytes.resize(length);
     if (length > 0)
         std::memcpy(bytes.data(), decoded.get(), length);
-    // GLib's decoder skips what it does not know, so what it made of a damaged text is told by the way back.
+    // GLib's decoder skips characters that it does not know, so encoding the result again shows whether the
+    // text was damaged.
     return encoded(bytes.data(), bytes.size()) == text ? std::optional(std::move(bytes)) : std::nullopt;
 }
 

@@ -11,14 +11,14 @@
 
 namespace host::system {
 
-/// Bytes as base64 with padding (RFC 4648, section 4).
+/// Encodes bytes as base64 with padding (RFC 4648, section 4).
 std::string base64Encoded(const platform::Data& data);
-/// Nothing for a text that base64Encoded() would not have made.
+/// Answers nothing for a text that base64Encoded() would not have made.
 std::optional<platform::Data> base64Decoded(const std::string& text);
 
-/// Bytes in the alphabet that is safe in URLs, without padding (RFC 4648, section 5).
+/// Encodes bytes in the alphabet that is safe in URLs, without padding (RFC 4648, section 5).
 std::string base64UrlEncoded(std::string_view bytes);
-/// Nothing for a text that base64UrlEncoded() would not have made.
+/// Answers nothing for a text that base64UrlEncoded() would not have made.
 std::optional<std::string> base64UrlDecoded(std::string_view text);
 
 } // namespace host::system

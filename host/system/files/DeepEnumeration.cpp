@@ -19,7 +19,7 @@ using platform::Url;
 
 namespace {
 
-// Far below the usual limit of 1024 descriptors for a process, and deeper than folders usually lie.
+// This is far below the usual limit of 1024 descriptors for a process, and deeper than folders usually are.
 constexpr std::size_t openLevels = 64;
 
 } // namespace
@@ -55,7 +55,7 @@ DeepEnumeration::Continue DeepEnumeration::readEntries(Level& level)
     while (const auto entry = reader.next()) {
         const auto type = entry->type ? entry->type : typeOfEntry(level.descriptor, entry->name);
         if (!type)
-            continue; // gone since it was read
+            continue; // it was removed since the folder was read
         if (*type == FileType::Directory)
             level.subfolders.emplace_back(entry->name);
         if (report(level, entry->name, *type) == Continue::No)
@@ -89,7 +89,7 @@ DeepEnumeration::Continue DeepEnumeration::leave()
         return Continue::Yes;
     auto& level = _levels.back();
     level.descriptor = openFolderAt(below.descriptor, "..").value.value_or(FileDescriptor());
-    // When someone moved the folder below meanwhile, its parent is another one now.
+    // When another program moved the folder below meanwhile, ".." now leads to another folder.
     if (!isAt(level))
         level.descriptor = openFolder(level.path).value.value_or(FileDescriptor());
     if (isAt(level))

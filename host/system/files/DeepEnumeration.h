@@ -15,9 +15,9 @@
 
 namespace host::system {
 
-/// One walk over everything below a folder, without recursion. A folder's entries are reported together,
-/// then those of its subfolders, each after the other. Names are resolved on descriptors, links never
-/// followed; a folder that is moved or replaced during the walk is reported as unreadable.
+/// Walks through everything below a folder, without recursion. A folder's entries are reported together, then
+/// those of its subfolders, one subfolder after the other. Names are resolved on descriptors and links are
+/// never followed. A folder that is moved or replaced during the walk is reported as unreadable.
 class DeepEnumeration {
 public:
     using Continue = platform::FileSystem::Continue;
@@ -34,13 +34,13 @@ public:
     void run();
 
 private:
-    /// A folder on the way from the root to where the walk is.
+    /// A folder on the way from the root to the present folder of the walk.
     struct Level {
         std::string path;
         FileDescriptor descriptor; ///< closed while the walk is far below
         dev_t device;
         ino_t inode;
-        std::vector<std::string> subfolders; ///< names that are still to be walked, the next one last
+        std::vector<std::string> subfolders; ///< names that are still to be visited, the next one last
     };
 
     Continue enter(FileDescriptor descriptor, std::string path);
@@ -49,7 +49,7 @@ private:
     Continue descend();
     Continue leave();
     Continue fail(const std::string& path, const SystemError& failure);
-    /// Whether the level's descriptor is open on the folder that the level began with.
+    /// Answers whether the level's descriptor still refers to the folder with which the level began.
     static bool isAt(const Level& level);
 
     const EntryHandler& _entry;

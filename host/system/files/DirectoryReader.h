@@ -14,15 +14,15 @@
 
 namespace host::system {
 
-/// Reads the entries of an open folder in large pieces, "." and ".." left out, names as bytes.
+/// Reads the entries of an open folder in large pieces, without "." and "..". Names are bytes.
 class DirectoryReader {
 public:
     struct Entry {
         std::string_view name; ///< zero-terminated; lives until the next call
-        std::optional<platform::FileType> type; ///< nothing where the file system does not tell
+        std::optional<platform::FileType> type; ///< absent when the file system does not say it
     };
 
-    /// `folder` stays open and the caller's.
+    /// `folder` stays open and belongs to the caller.
     explicit DirectoryReader(const FileDescriptor& folder)
         : _descriptor(folder.get())
     {
@@ -30,9 +30,9 @@ public:
     DirectoryReader(const DirectoryReader&) = delete;
     DirectoryReader& operator=(const DirectoryReader&) = delete;
 
-    /// The next entry; nothing at the end, and when reading failed (see error()).
+    /// Answers the next entry, or nothing at the end and after an error (see error()).
     std::optional<Entry> next();
-    /// Why reading ended early, if it did.
+    /// Answers the error that ended the reading early, if any.
     const SystemError& error() const { return _error; }
 
 private:
@@ -44,11 +44,11 @@ private:
     alignas(8) std::array<char, 64 * 1024> _buffer;
 };
 
-/// The type that the file system tells of a name in an open folder, links not followed.
+/// Answers the type of a name in an open folder, without following links.
 std::optional<platform::FileType> typeOfEntry(const FileDescriptor& folder, std::string_view name);
-/// The type behind the mode bits of a stat call.
+/// Answers the type in the mode bits of a stat call.
 platform::FileType fileType(unsigned mode);
-/// Opens a folder for reading its entries; a link is not followed.
+/// Opens a folder to read its entries, without following a link.
 SystemResult<FileDescriptor> openFolder(const std::string& path);
 SystemResult<FileDescriptor> openFolderAt(const FileDescriptor& parent, const std::string& name);
 

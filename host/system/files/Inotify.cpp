@@ -20,7 +20,7 @@ namespace {
 constexpr std::uint32_t watchedEvents = IN_CREATE | IN_DELETE | IN_MOVED_FROM | IN_MOVED_TO | IN_CLOSE_WRITE
     | IN_ATTRIB | IN_DELETE_SELF | IN_MOVE_SELF | IN_ONLYDIR;
 constexpr std::uint32_t lossEvents = IN_Q_OVERFLOW | IN_DELETE_SELF | IN_MOVE_SELF | IN_UNMOUNT | IN_IGNORED;
-// As many as the kernel keeps by default. Whoever falls that far behind looks again rather than reads on.
+// The kernel keeps as many events by default. When more are waiting, reading the folder again is quicker.
 constexpr std::size_t mostEvents = 16'384;
 
 } // namespace
@@ -51,7 +51,7 @@ void Inotify::State::append(const char* bytes, std::size_t length)
         std::memcpy(&event, bytes + at, sizeof event);
         if (waiting.size() >= mostEvents)
             waiting.assign(1, Event{-1, IN_Q_OVERFLOW, 0, {}});
-        // A file that is being written tells so again and again.
+        // A file that is being written causes the same event again and again.
         const char* name = event.len > 0 ? bytes + at + sizeof event : "";
         const bool isRepeated = !waiting.empty() && event.mask == IN_MODIFY
             && waiting.back().mask == IN_MODIFY && waiting.back().watch == event.wd
@@ -62,11 +62,11 @@ void Inotify::State::append(const char* bytes, std::size_t length)
     }
 }
 
-/// Reads what the kernel holds; the mutex is held.
+/// Reads the events that the kernel holds; the mutex is locked.
 void Inotify::State::read()
 {
     alignas(inotify_event) std::array<char, 16 * 1024> buffer;
-    // No more than the kernel ever holds: others may add events as quickly as they are read.
+    // The number of turns is limited, because other programs may add events as quickly as they are read.
     for (std::size_t turn = 0; turn < mostEvents; ++turn) {
         const auto length = ::read(descriptor.get(), buffer.data(), buffer.size());
         if (length > 0)
@@ -100,7 +100,7 @@ Inotify::Inotify(Writing writing, std::function<void()> arrived)
         _state->events |= IN_MODIFY;
 }
 
-/// Opens the queue unless it is open; the mutex is held.
+/// Opens the queue unless it is open; the mutex is locked.
 bool Inotify::State::open(const std::shared_ptr<State>& state)
 {
     if (state->descriptor)
@@ -129,7 +129,8 @@ SystemResult<int> Inotify::watch(const std::string& folder)
         if (!State::open(_state))
             return SystemError::last(folder);
     }
-    // Looking the folder up may take long on a storage that hangs; events are read meanwhile.
+    // This is called without the mutex, because the look-up of the folder may hang with its file system, and
+    // events must be read meanwhile.
     const int watch = ::inotify_add_watch(_state->descriptor.get(), folder.c_str(), _state->events);
     if (watch < 0)
         return SystemError::last(folder);

@@ -13,35 +13,36 @@
 
 namespace host::system {
 
-/// The kernel's notices of what happens in folders: one queue of the kernel's, made for the first watch and
-/// read in the main loop (GLib's default main context). Any thread, but for what `arrived` says.
+/// The kernel's notices of changes in folders. The kernel's queue is made for the first watch and read in the
+/// main loop (GLib's default main context). Any thread, except for `arrived`.
 class Inotify {
 public:
-    /// Whether a file that is being written tells so at once, or when it is closed.
+    /// Says whether a file that is being written is reported at once or when it is closed.
     enum class Writing { WhenClosed, AtOnce };
 
     struct Event {
         int watch = -1;
-        std::uint32_t mask = 0; ///< as the kernel has it
+        std::uint32_t mask = 0; ///< the kernel's bits
         std::uint32_t cookie = 0; ///< the same for both halves of a move; else 0
         std::string name; ///< empty: the watched folder itself
 
-        /// Whether names may have come and gone without notice: too many events, or the folder went away.
+        /// Answers whether changes may have been missed, because there were too many events or the folder
+        /// went away.
         bool isLoss() const;
     };
 
-    /// `arrived` is called on the main thread when events wait to be taken; it may end this object.
+    /// `arrived` is called on the main thread when events are waiting. It may destroy this object.
     Inotify(Writing writing, std::function<void()> arrived);
     ~Inotify();
     Inotify(const Inotify&) = delete;
     Inotify& operator=(const Inotify&) = delete;
 
-    /// Watches the names in a folder: made, removed, moved, written, with other attributes. Answers the
-    /// watch, the same one for the same folder. Errors: ENOSPC or EMFILE when the system has none left.
+    /// Watches the names in a folder: created, removed, moved, written, or with other attributes. Answers the
+    /// watch, which is the same for the same folder. Errors: ENOSPC or EMFILE when the system has none left.
     SystemResult<int> watch(const std::string& folder);
     void unwatch(int watch);
 
-    /// Everything that happened until this call and was not taken yet, in order.
+    /// Answers all events up to this call that were not taken yet, in order.
     std::vector<Event> take();
 
 private:

@@ -8,21 +8,21 @@
 
 namespace host::system {
 
-/// Whether a path is the folder's own or lies below it, compared name by name.
+/// Answers whether a path is the folder's own or lies below it, compared name by name.
 bool isPathWithin(std::string_view path, std::string_view folder);
-/// The folder that a path lies in; "." for a name alone.
+/// Answers the folder of a path; "." for a name alone.
 std::string parentPath(std::string_view path);
-/// What follows a path's last slash: the name, empty for a path that ends with a slash.
+/// Answers the part behind a path's last slash, which is the name, or empty when the path ends with a slash.
 std::string_view lastName(std::string_view path);
-/// The path of another name in the folder that a path lies in.
+/// Answers the path of another name in the folder of a path.
 std::string siblingPath(std::string_view path, std::string_view name);
-/// The path of an item's promise.
+/// Answers the path of an item's promise.
 std::string promisePath(std::string_view path);
-/// The name of the item that a promise of this name stands for; any other name stays as it is.
+/// Answers the name of the item for which a promise of this name stands. Any other name stays as it is.
 std::string itemName(std::string_view name);
-/// Whether a name is one that the drive gives to what is only on its way.
+/// Answers whether a name is the drive's private name of an item that is being written, moved or removed.
 bool isPassingName(std::string_view name);
-/// Whether an item is there, or its promise.
+/// Answers whether an item or its promise exists.
 bool isItemThere(const std::string& path);
 
 } // namespace host::system

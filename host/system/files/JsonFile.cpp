@@ -26,7 +26,7 @@ namespace {
 
 constexpr int maximumDamagedFiles = 1000;
 
-/// How deeply a text nests, counted without parsing it, so that no parser sees a bottomless one.
+/// Counts how deeply a text nests without parsing it, because the parser would recurse that deeply.
 int nesting(std::string_view text)
 {
     int depth = 0, deepest = 0;
@@ -49,7 +49,7 @@ int nesting(std::string_view text)
 
 std::unique_ptr<json> parseJson(std::string_view text, JsonLimits limits)
 {
-    // The parser takes a NUL for the end of the text, whatever follows it.
+    // The parser would take a NUL for the end of the text, so such a text is refused.
     if (text.size() > limits.bytes || nesting(text) > limits.depth
         || text.find('\0') != std::string_view::npos)
         return nullptr;
@@ -98,7 +98,7 @@ JsonFile::State JsonFile::setAside(std::string_view reason) const
 
 std::optional<platform::Error> JsonFile::write(const json& value) const
 {
-    g_mkdir_with_parents(parentPath(_path).c_str(), 0700); // the write tells when this failed
+    g_mkdir_with_parents(parentPath(_path).c_str(), 0700); // the write below reports a failure
     return writeFileAtomically(_path, jsonText(value));
 }
 

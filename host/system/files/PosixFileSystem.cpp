@@ -29,7 +29,8 @@ bool isExtensionHidden(const std::string& path)
     return lgetxattr(path.c_str(), hiddenExtensionAttribute, value, sizeof value) == 1 && value[0] == '1';
 }
 
-/// The system would take the part before a NUL for the whole path.
+/// Answers whether a path contains a NUL, because the system would take the part before it for the whole
+/// path.
 bool holdsNul(const std::string& path)
 {
     return path.find('\0') != std::string::npos;
@@ -78,7 +79,7 @@ std::optional<FileType> PosixFileSystem::typeOfItem(const std::string& path) con
 std::optional<platform::Url> PosixFileSystem::userDocumentsFolder() const
 {
     const char* path = g_get_user_special_dir(G_USER_DIRECTORY_DOCUMENTS);
-    // A user without such a folder has the home folder entered in its place.
+    // For a user without such a folder the system answers the home folder in its place.
     if (!path || std::string_view(path) == g_get_home_dir())
         return std::nullopt;
     return platform::Url::fileURL(path, platform::PathKind::Directory);

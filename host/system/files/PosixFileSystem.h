@@ -7,8 +7,8 @@
 
 namespace host::system {
 
-/// The kernel's file system. Enumeration works with descriptors and keeps few of them open, however deep the
-/// folders lie; it opens nothing but folders.
+/// The kernel's file system. Enumeration works with descriptors, of which few are open however deep the
+/// folders lie; it opens only folders.
 class PosixFileSystem : public platform::FileSystem {
 public:
     platform::Result<platform::FileAttributes> attributesOfItem(const std::string& path) const override;
@@ -23,7 +23,7 @@ public:
         const std::function<Continue(const platform::Url&, const platform::Error&)>& error) const override;
 };
 
-/// The extended attribute that hides a file's extension; its value is "1".
+/// The extended attribute that hides a file's extension. Its value is "1".
 inline constexpr const char* hiddenExtensionAttribute = "user.tarrow.hidden-extension";
 
 } // namespace host::system

@@ -20,7 +20,7 @@ using platform::FileErrorCode;
 
 namespace {
 
-/// What to say of an error, "%@" standing for the item's name.
+/// The sentence for an error; "%@" stands for the item's name.
 struct Sentence {
     int errorNumber;
     const char* key;
@@ -90,7 +90,7 @@ std::string displayName(std::string_view path)
 
 Error systemError(int errorNumber, std::string_view path, const std::optional<std::string>& destination)
 {
-    // A name is taken or refused where the item was to go, not where it comes from.
+    // These errors are about the name at the destination, not about the source.
     const bool concernsDestination = errorNumber == EEXIST || errorNumber == ENOTEMPTY
         || errorNumber == ENAMETOOLONG || errorNumber == EILSEQ || errorNumber == EINVAL;
     const auto name = displayName(destination && concernsDestination ? *destination : path);

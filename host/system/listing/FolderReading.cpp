@@ -15,13 +15,14 @@ using platform::ListingStage;
 
 namespace {
 
-// Large enough that a thread has something to do, small enough that both cores of a small machine get some.
+// A block is large enough to be worth a thread's work, and small enough that both cores of a small machine
+// get some.
 constexpr std::size_t blockEntries = 4096;
-// More rows than any screen shows, for a first look at folders that take longer.
+// These are more rows than any screen shows. They are delivered first when the rest takes longer.
 constexpr std::size_t firstRows = 256;
 constexpr std::size_t manyRows = 8 * firstRows;
 
-/// Blocks that are each sorted, read as one sorted sequence.
+/// Reads blocks that are each sorted as one sorted sequence.
 class MergedBlocks {
 public:
     explicit MergedBlocks(const std::vector<std::shared_ptr<ListingBlock>>& blocks)
@@ -35,7 +36,7 @@ public:
 
     bool isAtEnd() const { return _cursors.empty(); }
 
-    /// The block and the number in it of the next entry.
+    /// Answers the block of the next entry and the entry's number in the block.
     std::pair<const ListingBlock*, std::size_t> next()
     {
         std::ranges::pop_heap(_cursors, isAfter);
@@ -60,7 +61,7 @@ private:
     std::vector<Cursor> _cursors;
 };
 
-/// Calls for each entry that the folder itself has.
+/// Calls `visit` for each entry of the folder itself, without the extra items.
 template <typename Visit>
 void forEachEntry(const std::vector<std::shared_ptr<ListingBlock>>& blocks, const Visit& visit)
 {
@@ -133,7 +134,7 @@ std::shared_ptr<ListingBlock> FolderReading::fillBlock()
             break;
         const auto type = found->type ? found->type : typeOfEntry(_descriptor, found->name);
         if (!type)
-            continue; // gone since it was read
+            continue; // it was removed since the folder was read
         if (const auto entry = _tools->classifier.classify(found->name, *type))
             block->append(*entry);
     }

@@ -21,20 +21,20 @@
 
 namespace host::system {
 
-/// What all readings share.
+/// The tools that all readings share.
 struct ListingTools {
     EntryClassifier classifier;
     NameOrder order;
     std::shared_ptr<platform::OperationQueue> queue;
 };
 
-/// One reading of a folder. Blocks of entries are read one after the other, each on whatever thread of the
-/// queue is free; the thread that read a block sorts it while the next one is being read; the last to end
-/// merges them. It keeps itself alive until then.
+/// One reading of a folder. Blocks of entries are read one after the other, each on any free thread of the
+/// queue. The thread that read a block sorts it while the next block is being read. The last thread to end
+/// merges the blocks. The reading keeps itself alive until then.
 class FolderReading : public std::enable_shared_from_this<FolderReading> {
 public:
     using ExtraItems = std::vector<platform::FolderSnapshot::ExtraItem>;
-    /// What is listed, and how.
+    /// The folder that is listed, its extra items, and the grouping.
     struct Subject {
         platform::Url folder;
         ExtraItems extraItems;
@@ -43,7 +43,7 @@ public:
     struct Handlers {
         /// Called once with the open folder, before the first entry is read.
         std::function<void(const FileDescriptor&)> opened;
-        /// Called with the first rows when there are many, and then with all of them.
+        /// Called with the first rows when there are many, and then with all rows.
         std::function<void(std::shared_ptr<const platform::FolderSnapshot>)> snapshot;
     };
 
@@ -51,7 +51,7 @@ public:
     FolderReading(std::shared_ptr<const ListingTools> tools, Subject subject, Handlers handlers);
 
     void start();
-    /// No handler begins after the work that runs now.
+    /// Cancels the reading. After the work that runs now, no handler is called.
     void cancel() { _isCancelled = true; }
 
 private:
@@ -73,8 +73,8 @@ private:
     FileDescriptor _descriptor;
     std::optional<DirectoryReader> _reader;
     std::optional<platform::Error> _error;
-    std::vector<std::shared_ptr<ListingBlock>> _blocks; // filled one at a time
-    std::atomic<std::size_t> _unfinished = 0; // blocks that are read or sorted, and the reading itself
+    std::vector<std::shared_ptr<ListingBlock>> _blocks; // filled by one thread at a time
+    std::atomic<std::size_t> _unfinished = 0; // blocks that are being read or sorted, and the reading itself
 };
 
 } // namespace host::system

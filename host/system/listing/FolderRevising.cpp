@@ -22,9 +22,10 @@ using platform::FolderSnapshot;
 
 namespace {
 
-/// What stands at a name now.
+/// The present item at a name.
 struct Look {
-    bool isThere = false, isPromise = false, isPlaced = false; ///< placed: the list before has its place
+    bool isThere = false, isPromise = false,
+         isPlaced = false; ///< placed: its place in the previous list is known
     FolderEntryKind kind = FolderEntryKind::Document;
 };
 
@@ -59,20 +60,21 @@ private:
     const FolderGrouping _grouping;
     const FolderSnapshot& _before;
     std::unordered_map<std::string, Look, NameHash, std::equal_to<>> _looks;
-    std::vector<std::uint32_t> _gone; ///< indexes in the list before
-    std::vector<Stayed> _stayed; ///< likewise, and what they are now
+    std::vector<std::uint32_t> _gone; ///< indexes in the previous list
+    std::vector<Stayed> _stayed; ///< indexes in the previous list, and the present items
     ListingBlock _newcomers;
-    std::vector<std::size_t> _places; ///< of the newcomers, before which index of the list before
-    mutable std::vector<std::uint8_t> _key; ///< of the entry that is compared
+    std::vector<std::size_t>
+        _places; ///< for each newcomer the index in the previous list before which it belongs
+    mutable std::vector<std::uint8_t> _key; ///< key of the entry that is being compared
     FolderRevision _revision;
     std::size_t _nextGone = 0, _nextStayed = 0;
 };
 
-/// Adds what a name that was told of stands for to what is looked at.
+/// Looks at the item for which a reported name stands.
 void Revising::lookAt(const FileDescriptor& folder, std::span<const std::string> names)
 {
     for (const auto& name : names) {
-        // A hidden name counts for what it promises.
+        // A promise's file has a hidden name, which stands for the promised item.
         const auto listed = _tools.classifier.classify(name, FileType::Regular);
         if (!listed)
             continue;
@@ -99,7 +101,8 @@ Look Revising::look(const FileDescriptor& folder, const std::string& name) const
 
 void Revising::findInListBefore()
 {
-    // Most names of a long list have another length than the few that are sought.
+    // The lengths of the names are compared first, because most names of a long list differ in length from
+    // the few that are sought.
     std::array<bool, 256> lengths{};
     const auto lengthMark = [](std::string_view name) { return std::min<std::size_t>(name.size(), 255); };
     for (const auto& [name, look] : _looks)
@@ -143,7 +146,8 @@ bool Revising::isBefore(std::size_t index, std::size_t newcomer) const
     return _newcomers.isAfter(entry, _key, newcomer);
 }
 
-/// Newcomers are often neighbours, so that the place is sought in growing steps first.
+/// Finds the place of a newcomer. Newcomers are often neighbours, so the search begins with small steps that
+/// grow.
 std::size_t Revising::placeOf(std::size_t newcomer, std::size_t from) const
 {
     std::size_t step = 1, end = from;
@@ -162,7 +166,7 @@ std::size_t Revising::placeOf(std::size_t newcomer, std::size_t from) const
     return from;
 }
 
-/// Takes over a stretch of the list before, without what has gone.
+/// Copies a range of the previous list, without the removed entries.
 void Revising::takeOver(FolderSnapshot::Builder& builder, std::size_t from, std::size_t to)
 {
     while (from < to) {

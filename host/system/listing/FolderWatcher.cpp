@@ -23,7 +23,7 @@ struct FolderWatcher::State : std::enable_shared_from_this<State> {
         {
             const std::lock_guard lock(mutex);
             for (auto& event : inotify->take()) {
-                // What is left of a former folder's events concerns nobody.
+                // Events of a folder that was watched before are ignored.
                 if (event.watch != watch && event.watch >= 0)
                     continue;
                 auto& told = event.mask == IN_MODIFY ? namesWritten : names;

@@ -16,7 +16,7 @@ using platform::FolderEntryKind;
 
 namespace {
 
-/// Eight bytes of a key as a number that compares as they do; a key that ends counts as zero bytes.
+/// Answers eight bytes of a key as a number with the same order. A key that ends counts as zero bytes.
 std::uint64_t bigEndian(const std::vector<std::uint8_t>& keys, std::size_t begin, std::size_t length)
 {
     std::uint64_t value = 0;
@@ -45,7 +45,7 @@ void ListingBlock::appendKey(const FolderEntry& entry, const NameOrder& order,
     platform::FolderGrouping grouping, std::vector<std::uint8_t>& keys)
 {
     const bool isFolder = platform::opensAsFolder(entry.kind);
-    // What is grouped comes first, whatever its name.
+    // Folders come first when they are grouped, whatever their names.
     keys.push_back(isFolder && grouping == platform::FolderGrouping::FoldersFirst ? 0 : 1);
     order.appendKey(entry.name, keys);
 }
@@ -90,7 +90,7 @@ std::strong_ordering ListingBlock::compare(const Rank& a, const ListingBlock& ot
         return order <=> 0;
     if (a.keyLength != b.keyLength)
         return a.keyLength <=> b.keyLength;
-    // Names that the language holds equal are still two names.
+    // Names that are equal in the language are ordered by their bytes, because they are still two names.
     return entry(a.number).name.compare(other.entry(b.number).name) <=> 0;
 }
 

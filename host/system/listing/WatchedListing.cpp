@@ -21,24 +21,24 @@ using platform::weakly;
 
 namespace {
 
-// A program that saves makes several changes at once, of which the first alone is not worth a look.
+// A program that saves makes several changes at once, so the list waits a little after the first.
 constexpr Duration namesSettle = std::chrono::milliseconds(10);
-// A folder that goes away may be about to be replaced.
+// A folder that disappears may be about to be replaced.
 constexpr Duration lossSettles = std::chrono::milliseconds(50);
-// A folder that changes all the time must not keep the machine busy: between two works there is time for the
-// list to show the first, and work takes a fifth of the time at most.
+// A folder that changes all the time must not keep the machine busy. Between two looks the list has time to
+// show the first one's result, and the looks take a fifth of the time at most.
 constexpr Duration shortestRest = std::chrono::milliseconds(40);
 constexpr int restFactor = 4;
-// A file may be written for hours.
+// A file that is being written is looked at only so often, because the writing may take hours.
 constexpr Duration betweenLooksAtWriting = std::chrono::milliseconds(500);
-// From about here on it is quicker to read a folder whole.
+// From about so many names on, reading the whole folder is quicker.
 constexpr std::size_t manyNames = 4096;
-// What a clock says that was set meanwhile.
+// The measured time is limited, because the clock may be set meanwhile.
 constexpr Duration longestWork = std::chrono::seconds(1);
 
 } // namespace
 
-/// Where readings leave what they have for the main thread. Only the newest waits there.
+/// Holds the readings' results for the main thread. Only the newest result waits in it.
 class WatchedListing::Inbox {
 public:
     void folderOpened(const std::optional<Identity>& identity)
@@ -51,7 +51,7 @@ public:
         const std::lock_guard lock(_mutex);
         return _folder;
     }
-    /// Whether nothing waited, so that the main thread must be told.
+    /// Answers whether nothing was waiting, so that the main thread must be told.
     bool put(std::shared_ptr<const FolderSnapshot> snapshot)
     {
         const std::lock_guard lock(_mutex);
@@ -93,7 +93,7 @@ void WatchedListing::refresh()
     work();
 }
 
-/// Begins what is to be done, unless something is under way or it is too early.
+/// Begins the next work, unless work is under way or a pause has not ended.
 void WatchedListing::work()
 {
     if (_reading || _isRevising || _isResting || (!_mustRead && _names.empty()))
@@ -105,7 +105,7 @@ void WatchedListing::work()
         startRevising();
 }
 
-/// Nothing begins by itself meanwhile.
+/// Pauses: no work begins before the end.
 void WatchedListing::restFor(Duration pause)
 {
     _isResting = true;
@@ -140,7 +140,7 @@ void WatchedListing::folderChanged(const Names& names)
     const bool mustReadNow = isLoss || isTooMuch();
     if (mustReadNow)
         _names.clear();
-    // Only the first loss is waited for, or a stream of them would never end.
+    // The pause begins at the first loss only, because a stream of losses would otherwise extend it for ever.
     if (mustReadNow && !std::exchange(_mustRead, true))
         _mustSettle = true;
     if (!_isResting && (_mustRead || !_names.empty()))
@@ -183,7 +183,7 @@ void WatchedListing::startReading()
         if (inbox->put(std::move(snapshot)))
             queue->async(deliver);
     };
-    // The watch begins before the reading, so that no change falls between them.
+    // The watch begins before the reading, so that no change is missed in between.
     const auto opened = [watcher = _watcher, inbox = _inbox](const FileDescriptor& folder) {
         watcher->watch(folder);
         inbox->folderOpened(identityOf(folder));
@@ -234,7 +234,7 @@ void WatchedListing::revisingEnded(const Snapshot& before, const Snapshot& after
 {
     const auto keepsSelf = shared_from_this();
     _isRevising = false;
-    // Another folder at this place, or a list that should be packed anew.
+    // The folder is read anew when another folder has taken its place, or when the list wastes memory.
     _mustRead = _mustRead || !after || after->isMostlyWaste();
     if (after && after != before) {
         _latest = after;

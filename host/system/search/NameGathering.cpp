@@ -20,10 +20,11 @@ using platform::FolderEntryKind;
 
 namespace {
 
-constexpr std::size_t firstProgress = 20'000; ///< items, read in well under a tenth of a second
-constexpr std::size_t progressGrowth = 4; ///< so that all copies together cost a third of the last one
-/// The clock of file times moves in steps of up to ten milliseconds: a folder that was modified so shortly
-/// before it was read may change again without a new time.
+constexpr std::size_t firstProgress = 20'000; ///< items, which are read in well under a tenth of a second
+constexpr std::size_t progressGrowth =
+    4; ///< with this factor all copies together cost a third of the last one
+/// The clock of file times advances in steps of up to ten milliseconds, so a folder that was modified this
+/// shortly before it was read may change again without a new time.
 constexpr std::int64_t unsettled = 100'000'000; // nanoseconds
 
 std::int64_t now()
@@ -33,7 +34,7 @@ std::int64_t now()
     return nanosecondsOf(time);
 }
 
-/// 0 when the folder cannot be looked at.
+/// Answers the modification time, or 0 when the folder cannot be read.
 std::int64_t modificationTime(const FileDescriptor& folder)
 {
     struct stat status { };
@@ -54,7 +55,8 @@ NameGathering::NameGathering(const EntryClassifier& classifier, const NameFoldin
 {
     if (!_earlier)
         return;
-    // What an earlier search shows must not shrink first.
+    // The results of an earlier search must not shrink at first, so progress is reported only with more
+    // items.
     _nextProgress = std::max(firstProgress, _earlier->itemCount());
     for (const auto& folder : _earlier->folders())
         _earlierFolders.emplace(folder.path, &folder);
@@ -127,7 +129,7 @@ void NameGathering::read(const FileDescriptor& descriptor, std::vector<std::stri
     }
     for (const auto& [name, kind] : promised) {
         struct stat status { };
-        // An item that is here counts, not the promise beside it.
+        // When an item is here, it counts and not the promise beside it.
         if (::fstatat(descriptor.get(), name.c_str(), &status, AT_SYMLINK_NOFOLLOW) != 0)
             append({name, kind, true}, subfolders);
     }

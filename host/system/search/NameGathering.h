@@ -18,16 +18,16 @@
 
 namespace host::system {
 
-/// Reads the names below some folders into an index. Folders that an earlier index knows, and that were not
-/// modified since, are taken from it. Links are not followed; folders deeper than `deepestLevel` are left
-/// out. Used once, by one thread.
+/// Reads the names below some folders into an index. Folders that an earlier index has, and that were not
+/// modified since, are copied from it. Links are not followed, and folders deeper than `deepestLevel` are
+/// left out. It is used once, by one thread.
 class NameGathering {
 public:
     static constexpr std::size_t deepestLevel = 200; ///< one descriptor is open for each level
 
     struct Handlers {
         std::function<bool()> isCancelled;
-        /// Called with what is known so far, less and less often as there is more.
+        /// Called with the index so far, less and less often as it grows.
         std::function<void(const NameIndex&)> progress;
     };
 
@@ -35,14 +35,14 @@ public:
         std::shared_ptr<const NameIndex> earlier, Handlers handlers);
 
     NameIndex gather(const std::vector<std::string>& roots);
-    /// Whether the result differs from the earlier index.
+    /// Answers whether the result differs from the earlier index.
     bool hasChanged() const { return _readFolders > 0 || _keptFolders != _earlierFolders.size(); }
 
 private:
     struct Level {
         std::string path;
         FileDescriptor descriptor;
-        std::vector<std::string> subfolders; ///< still to be walked
+        std::vector<std::string> subfolders; ///< subfolders that are still to be read
     };
 
     void enter(SystemResult<FileDescriptor> folder, std::string path);
@@ -60,7 +60,7 @@ private:
     NameIndex::Builder _builder;
     std::vector<Level> _levels;
     std::size_t _readFolders = 0, _keptFolders = 0, _nextProgress;
-    std::string _folded; ///< kept for its memory
+    std::string _folded; ///< kept to reuse its memory
 };
 
 } // namespace host::system

@@ -8,7 +8,7 @@
 
 namespace host::system {
 
-/// Bytes as text for people: what is no UTF-8 becomes replacement characters.
+/// Answers bytes as text for people. Bytes that are not UTF-8 become replacement characters.
 std::string displayableText(std::string_view bytes);
 
 } // namespace host::system
