@@ -82,7 +82,7 @@ void observe()
             [](const auto&) { FileTags::_tagColorsDidChange(); });
 }
 
-/// The table; the first call reads it and has it follow the store.
+/// Answers the table. The first call reads it and begins to follow the store.
 std::shared_ptr<const Tags> currentTags()
 {
     static std::once_flag once;

@@ -22,7 +22,7 @@ class StackView;
 namespace screens {
 
 /// Stands in for missing content: an icon, a title that says what happened, a message that says what to do,
-/// how far a download has come and buttons, centred and not wider than a comfortable line of text. Main
+/// the progress of a download, and buttons, centred and not wider than a comfortable line of text. Main
 /// thread only.
 class PlaceholderView : public kit::View {
 public:

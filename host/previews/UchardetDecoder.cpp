@@ -65,7 +65,7 @@ struct CloseConverter {
 };
 using Converter = std::unique_ptr<std::remove_pointer_t<GIConv>, CloseConverter>;
 
-/// Null for an encoding that the C library does not know.
+/// Answers null for an encoding that the C library does not know.
 Converter converterFrom(const std::string& encoding)
 {
     auto* opened = g_iconv_open("UTF-8", encoding.c_str());
@@ -86,7 +86,8 @@ std::string converted(const Converter& converter, std::string_view bytes, std::s
         text.append(piece, sizeof piece - room);
         if (problem == 0 || problem == E2BIG)
             continue;
-        // Half a unit at the end of UTF-16 or UTF-32 is no character that could be broken.
+        // An incomplete unit at the end of UTF-16 or UTF-32 is dropped, because it is not a character that
+        // could be broken.
         if (problem == EINVAL && (end == TextEnd::Cut || unit > 1))
             break;
         text += replacement;

@@ -18,7 +18,7 @@ class Button : public View {
 public:
     explicit Button(std::string title = {}, std::function<void()> action = {});
 
-    /// A button that shows a symbol of the icon theme; `label` is its accessible name.
+    /// Makes a button that shows a symbol of the icon theme; `label` is its accessible name.
     static std::shared_ptr<Button> withSymbol(
         const char* icon, const std::string& label, std::function<void()> action = {});
 

@@ -12,8 +12,8 @@ namespace screens {
 
 namespace {
 
-/// Guesses whether the text is UTF-16 without a byte-order mark, and of which order: in the usual scripts one
-/// half of spaces, digits and line ends is NUL.
+/// Guesses whether the text is UTF-16 without a byte-order mark, and in which byte order: in the usual
+/// scripts one half of spaces, digits and line ends is NUL.
 const char* guessedUtf16(std::string_view bytes)
 {
     constexpr std::size_t looked = 4096, fewest = 8;
@@ -63,7 +63,7 @@ std::string fromUtf8OrOlder(std::string_view bytes, TextEnd end, const TextDecod
 std::string decodedText(std::string_view bytes, TextEnd end, const TextDecoder& decoder)
 {
     using namespace std::string_view_literals;
-    // That of UTF-32 begins like that of UTF-16.
+    // UTF-32 is tried first, because its byte-order mark begins with that of UTF-16.
     static constexpr std::pair<std::string_view, const char*> marks[] = {{"\xFF\xFE\0\0"sv, "UTF-32LE"},
         {"\0\0\xFE\xFF"sv, "UTF-32BE"}, {"\xFF\xFE"sv, "UTF-16LE"}, {"\xFE\xFF"sv, "UTF-16BE"}};
     const auto* mark =

@@ -54,7 +54,7 @@ public:
     /// Loads the libraries first. Answers nothing when the module is missing, else what the module's decoder
     /// answers.
     std::optional<std::string> likelyEncoding(std::string_view bytes) const override;
-    /// Loads the libraries first. When the module is missing, what is no UTF-8 becomes replacement
+    /// Loads the libraries first. When the module is missing, bytes that are not UTF-8 become replacement
     /// characters.
     std::string decode(
         std::string_view bytes, const std::string& encoding, platform::TextEnd end) const override;
