@@ -102,8 +102,8 @@ public:
     /// Answers the menu of orders and, while the list is editing, of selections.
     kit::Menu optionsMenu();
 
-    /// Other classes attach objects to the list, which keeps them as long as it lives; null removes one. The
-    /// object is answered only for the type with which it was attached.
+    /// Other classes attach objects to the list, which keeps them as long as it lives; null removes one. Ask
+    /// with the type with which the object was attached, because the type is not checked.
     void setAssociatedObject(const std::string& key, std::shared_ptr<void> object);
     template <typename T>
     std::shared_ptr<T> associatedObject(const std::string& key) const

@@ -13,7 +13,7 @@ namespace screens {
 
 namespace {
 
-/// When so many revisions wait, applying the newest whole list at once is quicker than applying them all.
+/// When so many revisions wait, comparing with the list of the last one is quicker than applying them all.
 constexpr std::size_t mostWaiting = 8;
 
 FolderContentsUpdate updateBetween(

@@ -249,7 +249,8 @@ void PreviewController::showContent()
         showPreview(preview);
     else if (!_download)
         showSummary();
-    // A document in a peek is not downloaded, because the user has not opened it.
+    // The download waits until the screen has appeared, because a user who only passes by has not asked for
+    // it.
     if (appearanceState() == kit::AppearanceState::Appeared)
         startDownload();
 }

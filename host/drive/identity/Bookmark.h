@@ -12,7 +12,7 @@ namespace host::drive {
 
 /// Names a document for another device of the same account.
 struct Bookmark {
-    /// Longer texts are refused; bytes.
+    /// Longer texts are refused. The limit is in bytes.
     static constexpr std::size_t maximumLength = 4096;
 
     std::string account; ///< the account's identity

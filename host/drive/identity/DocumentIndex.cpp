@@ -17,7 +17,7 @@ namespace {
 /// So many documents are noted in one transaction; other processes may read and write in between.
 constexpr std::size_t batch = 500;
 
-/// The first and the last path below a folder, in the order of their bytes.
+/// The bounds of the paths below a folder in the order of their bytes; `end` is behind the last one.
 struct PathsBelow {
     explicit PathsBelow(const std::string& folder)
         : first(folder + '/')

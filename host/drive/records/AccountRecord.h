@@ -14,7 +14,7 @@ namespace host::drive {
 
 /// The content of account.json, which describes the signed-in account.
 struct AccountRecord {
-    /// Larger account files are not read; bytes.
+    /// Larger account files are not read. The limit is in bytes.
     static constexpr std::size_t maximumFileSize = 64 * 1024;
 
     std::string identity; ///< identifies the account, never empty

@@ -15,7 +15,7 @@ namespace host::drive {
 
 /// The file in the account's folder by which one device tells the others of its current activity.
 struct ActivityRecord {
-    /// Larger files are not read; bytes.
+    /// Larger files are not read. The limit is in bytes.
     static constexpr std::size_t maximumFileSize = 16 * 1024;
 
     std::string device; ///< identifier: letters, digits and hyphens

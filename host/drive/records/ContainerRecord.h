@@ -14,7 +14,7 @@ namespace host::drive {
 
 /// A container's description as it is stored on disk.
 struct ContainerRecord {
-    /// Larger descriptions are not read; bytes.
+    /// Larger descriptions are not read. The limit is in bytes.
     static constexpr std::size_t maximumFileSize = 256 * 1024;
 
     std::map<std::string, std::string> names; ///< by language ("de", "pt_BR")

@@ -15,7 +15,7 @@ namespace host::drive {
 
 using system::referenceExtension;
 
-/// Larger references and aliases are not read; bytes.
+/// Larger references and aliases are not read. The limit is in bytes.
 inline constexpr std::size_t maximumLinkRecordSize = 64 * 1024;
 
 /// Answers the text of a reference to a document, by its container and the path below the container's

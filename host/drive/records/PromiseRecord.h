@@ -21,7 +21,7 @@ const char* nameOf(platform::SharedItemRole role);
 /// The attributes that a promise stores for its item. An attribute that is missing or cannot be right is
 /// unknown.
 struct PromiseRecord {
-    /// Larger promises are not read; bytes.
+    /// Larger promises are not read. The limit is in bytes.
     static constexpr std::size_t maximumFileSize = 64 * 1024;
     static constexpr std::string_view suffix = system::promiseSuffix;
 

@@ -20,7 +20,7 @@ namespace host::drive {
 class LocalKeyValueStore : public platform::KeyValueStore,
                            public std::enable_shared_from_this<LocalKeyValueStore> {
 public:
-    /// Larger files are not read; bytes.
+    /// Larger files are not read. The limit is in bytes.
     static constexpr std::size_t maximumFileSize = 1024 * 1024;
 
     static std::shared_ptr<LocalKeyValueStore> create(

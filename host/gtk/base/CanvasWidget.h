@@ -20,7 +20,7 @@ public:
     virtual void canvasAllocate(int width, int height) = 0;
     /// Paints the widget and its children.
     virtual void canvasSnapshot(GtkSnapshot* snapshot) = 0;
-    /// Answers whether a point belongs to the widget. A canvas without a client answers by its rectangle.
+    /// Answers whether a point, in the widget's coordinates, belongs to the widget.
     virtual bool canvasContains(double x, double y) = 0;
 };
 

@@ -126,7 +126,7 @@ void NavigationPeer::showMoving(const kit::NavigationTransition& transition)
     page->load();
     const auto from = knownPageOf(transition.from);
     if (from && transition.kind == kit::NavigationKind::Pop) {
-        // The page below may be new and therefore lie in front of the leaving one.
+        // A page that was made only now comes after the leaving one, although it lies below it.
         adw_leaflet_reorder_child_after(leaflet(), from->widget(), page->widget());
     } else if (from) {
         adw_leaflet_reorder_child_after(leaflet(), page->widget(), from->widget());
