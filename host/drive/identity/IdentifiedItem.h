@@ -17,7 +17,7 @@ namespace host::drive {
 /// answers are about one file.
 class IdentifiedItem : public platform::DocumentIdentifiers::OpenFile {
 public:
-    /// Opens what is at a path below the drive's home, without following a link: the item, else its promise.
+    /// Opens the item at a path below the drive's home, else its promise, without following a link.
     static system::SystemResult<IdentifiedItem> open(const DriveLayout& layout, const std::string& path);
 
     /// Answers the identifier that the item carries; 0 for none, and for a promise that cannot be read.
