@@ -5,7 +5,7 @@
 
 #include "app/SchemeEntry.h"
 #include "browser/NavController.h"
-#include "items/DocumentIdentifiers.h"
+#include "items/DocumentID.h"
 #include "items/Settings.h"
 #include "items/UrlResolution.h"
 #include "kit/controllers/Window.h"

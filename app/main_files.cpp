@@ -7,7 +7,7 @@
 #include "host/system/desktop/MimeTypeRegistry.h"
 #include "host/system/files/PosixFileSystem.h"
 #include "host/system/queues/GLibDispatch.h"
-#include "items/DocumentIdentifiers.h"
+#include "items/DocumentID.h"
 #include "items/FileUtils.h"
 #include "platform/FileChanges.h"
 #include "platform/FileSystem.h"

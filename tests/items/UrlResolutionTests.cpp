@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "items/DocumentIdentifiers.h"
+#include "items/DocumentID.h"
 #include "items/FileUtils.h"
 #include "items/UrlResolution.h"
 #include "tests/items/support/ItemsFixture.h"
