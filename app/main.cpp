@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "app/AppDelegate.h"
+#include "app/BuildDate.h"
 #include "host/drive/service/LocalActivityHandOver.h"
 #include "host/drive/service/LocalCloudDocumentService.h"
 #include "host/gtk/app/DesktopSharing.h"
@@ -132,7 +133,7 @@ int main(int argc, char** argv)
     const auto executable = executablePath(argc > 0 ? argv[0] : nullptr);
     op.debug("-------------------------------------------------------");
     op.info("Running %s", executable);
-    op.info("Built (main) on " __DATE__ " @ " __TIME__);
+    op.info("Built (main) on %s", buildDate);
 
     // The locale is read once, because setting up the message catalogues changes the environment variables
     // that it is read from.
