@@ -8,6 +8,7 @@
 #include "kit/controllers/NavigationItem.h"
 #include "kit/views/ListView.h"
 #include "kit/views/TextField.h"
+#include "platform/FileSystem.h"
 #include "screens/PlaceholderView.h"
 #include "screens/move/MoveTargetPicker.h"
 #include "screens/move/MoveTargetScreen.h"
