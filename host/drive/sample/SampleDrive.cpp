@@ -15,8 +15,9 @@
 
 #include <cstdio>
 #include <memory>
+#include <mutex>
 
-extern "C" GResource* trw_sample_get_resource();
+extern "C" void trw_sample_register_resource();
 
 namespace host::drive::sample {
 
@@ -42,10 +43,10 @@ SampleWriter::Content text(const char* content)
 SampleWriter::Content file(const char* name)
 {
     return [path = std::string("/app/tarrow/Drive/sample/") + name] {
+        static std::once_flag once;
+        std::call_once(once, trw_sample_register_resource);
         const std::unique_ptr<GBytes, decltype(&g_bytes_unref)> bytes(
-            g_resource_lookup_data(
-                trw_sample_get_resource(), path.c_str(), G_RESOURCE_LOOKUP_FLAGS_NONE, nullptr),
-            g_bytes_unref);
+            g_resources_lookup_data(path.c_str(), G_RESOURCE_LOOKUP_FLAGS_NONE, nullptr), g_bytes_unref);
         gsize size = 0;
         const auto* data = static_cast<const char*>(g_bytes_get_data(bytes.get(), &size));
         return std::string(data, size);
