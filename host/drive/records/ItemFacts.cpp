@@ -21,6 +21,7 @@ namespace host::drive {
 
 namespace {
 
+using host::system::SystemError;
 using platform::DownloadingStatus;
 
 constexpr std::size_t largestAttribute = 64 * 1024; // the kernel's own limit
@@ -87,14 +88,14 @@ bool hasMarks(const struct statx& status)
     return S_ISREG(status.stx_mode) || S_ISDIR(status.stx_mode);
 }
 
-int status(const std::string& path, struct statx& result)
+SystemError readStatus(ItemFacts& facts, const std::string& path)
 {
     constexpr unsigned mask = STATX_TYPE | STATX_MODE | STATX_SIZE | STATX_MTIME | STATX_BTIME | STATX_INO;
     constexpr int flags = AT_SYMLINK_NOFOLLOW | AT_NO_AUTOMOUNT | AT_STATX_DONT_SYNC;
-    return ::statx(AT_FDCWD, path.c_str(), flags, mask, &result) == 0 ? 0 : errno;
+    return SystemError::unless(::statx(AT_FDCWD, path.c_str(), flags, mask, &facts.status) == 0);
 }
 
-void readPromise(ItemFacts& facts, const std::string& itemPath, int missingReason)
+void readPromise(ItemFacts& facts, const std::string& itemPath, const SystemError& missingReason)
 {
     static constexpr platform::Operation op{"-[LocalPromisedItems readPromise:]"};
     auto path = PromiseRecord::pathFor(itemPath);
@@ -116,10 +117,10 @@ void readPromise(ItemFacts& facts, const std::string& itemPath, int missingReaso
     facts.promisePath = std::move(path);
 }
 
-/// Sets the facts of a file from the result of its stat call, whose errno is `failure` (0: none).
-void describeFile(ItemFacts& facts, const std::string& path, int failure)
+/// Sets the facts of a file from the result of its stat call.
+void describeFile(ItemFacts& facts, const std::string& path, const SystemError& failure)
 {
-    if (failure != 0) {
+    if (failure) {
         facts.error = itemError(failure, path);
         return;
     }
@@ -173,7 +174,7 @@ std::optional<platform::Date> ItemFacts::modified() const
 ItemFacts lookAtItem(const std::string& path)
 {
     ItemFacts facts;
-    if (const int failure = status(path, facts.status); failure == ENOENT)
+    if (const auto failure = readStatus(facts, path); failure.is(ENOENT))
         readPromise(facts, path, failure);
     else
         describeFile(facts, path, failure);
@@ -183,7 +184,7 @@ ItemFacts lookAtItem(const std::string& path)
 ItemFacts lookAtFile(const std::string& path)
 {
     ItemFacts facts;
-    describeFile(facts, path, status(path, facts.status));
+    describeFile(facts, path, readStatus(facts, path));
     return facts;
 }
 
