@@ -5,6 +5,7 @@
 
 #include "host/drive/records/SmallFile.h"
 #include "host/system/files/AtomicWrite.h"
+#include "host/system/files/SystemErrors.h"
 
 #include <fcntl.h>
 
@@ -13,15 +14,14 @@
 namespace host::drive {
 
 using host::system::FileDescriptor;
-using host::system::SystemError;
 using host::system::SystemResult;
 
 platform::Result<PromiseRecord> readPromise(const DriveEntry& entry)
 {
-    const auto text = host::system::readWholeFile(
-        entry.folder, entry.promiseName(), PromiseRecord::maximumFileSize, entry.path);
+    const auto text =
+        host::system::readWholeFile(entry.folder, entry.promiseName(), PromiseRecord::maximumFileSize);
     if (!text)
-        return *text.error;
+        return host::system::systemError(text.error, entry.path);
     auto promise = PromiseRecord::parse(*text);
     return promise ? platform::Result<PromiseRecord>(std::move(*promise))
                    : damagedRecord(entry.path, "its promise is no JSON object");
@@ -29,15 +29,12 @@ platform::Result<PromiseRecord> readPromise(const DriveEntry& entry)
 
 SystemResult<std::string> contentOfPromise(const FileDescriptor& folder, const std::string& promiseName)
 {
-    const auto text =
-        host::system::readWholeFile(folder, promiseName, PromiseRecord::maximumFileSize, promiseName);
+    const auto text = host::system::readWholeFile(folder, promiseName, PromiseRecord::maximumFileSize);
+    // A promise that is gone has no content, and one that is too large counts as damaged. Any other error
+    // does not mean that there is no content.
+    if (!text && !text.error.is(ENOENT) && !text.error.is(EFBIG))
+        return text.error;
     const auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
-    // A promise that is too large counts as damaged. Any other error of the system does not mean that there
-    // is no content.
-    const bool hasFailed =
-        text.error && text.error->domain() == platform::errorDomain::system && text.error->code() != EFBIG;
-    if (hasFailed)
-        return SystemError(text.error->code(), promiseName);
     return promise ? promise->content : std::string();
 }
 

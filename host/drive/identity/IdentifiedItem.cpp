@@ -106,11 +106,7 @@ SystemError IdentifiedItem::carryInPromise(std::uint32_t identifier) const
     if (!promise)
         return {EBADMSG, _path};
     promise->documentIdentifier = identifier;
-    const auto error = host::system::writeFileAtomically(
-        entry->folder, entry->promiseName(), promise->toJson(), entry->path);
-    if (!error)
-        return {};
-    return {error->domain() == platform::errorDomain::system ? error->code() : EIO, _path};
+    return host::system::writeFileAtomically(entry->folder, entry->promiseName(), promise->toJson());
 }
 
 Result<platform::DocumentIdentifiers::OpenFile::Attributes> IdentifiedItem::attributes() const

@@ -20,9 +20,12 @@ using platform::Error;
 
 namespace {
 
-FileDescriptor openParent(const std::string& path)
+SystemResult<FileDescriptor> openParent(const std::string& path)
 {
-    return FileDescriptor(::open(parentPath(path).c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
+    FileDescriptor folder(::open(parentPath(path).c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
+    if (!folder)
+        return SystemError::last(path);
+    return folder;
 }
 
 /// Answers the access rights of the present file under the name.
@@ -52,8 +55,8 @@ SystemError writeTemporary(const FileDescriptor& folder, const std::string& name
     return SystemError::unless(isDone, name);
 }
 
-std::optional<Error> write(const FileDescriptor& folder, const std::string& name, std::string_view content,
-    std::string_view path, Purpose purpose)
+SystemError write(
+    const FileDescriptor& folder, const std::string& name, std::string_view content, Purpose purpose)
 {
     const unsigned flags = purpose == Purpose::Make ? RENAME_NOREPLACE : 0;
     const auto temporary = uniqueName(".trwtmp-");
@@ -62,10 +65,16 @@ std::optional<Error> write(const FileDescriptor& folder, const std::string& name
         failure = SystemError::last(name);
     if (failure) {
         ::unlinkat(folder.get(), temporary.c_str(), 0);
-        return systemError(failure, path);
+        return failure;
     }
-    if (purpose == Purpose::Replace)
-        failure = syncFolder(folder);
+    return purpose == Purpose::Replace ? syncFolder(folder) : SystemError();
+}
+
+std::optional<Error> write(const std::string& path, std::string_view content, Purpose purpose)
+{
+    const auto folder = openParent(path);
+    const auto failure =
+        folder ? write(*folder, std::string(lastName(path)), content, purpose) : folder.error;
     return failure ? std::optional(systemError(failure, path)) : std::nullopt;
 }
 
@@ -73,24 +82,18 @@ std::optional<Error> write(const FileDescriptor& folder, const std::string& name
 
 std::optional<Error> writeFileAtomically(const std::string& path, std::string_view content)
 {
-    const auto folder = openParent(path);
-    if (!folder)
-        return systemError(errno, path);
-    return writeFileAtomically(folder, std::string(lastName(path)), content, path);
+    return write(path, content, Purpose::Replace);
 }
 
-std::optional<Error> writeFileAtomically(
-    const FileDescriptor& folder, const std::string& name, std::string_view content, std::string_view path)
+SystemError writeFileAtomically(
+    const FileDescriptor& folder, const std::string& name, std::string_view content)
 {
-    return write(folder, name, content, path, Purpose::Replace);
+    return write(folder, name, content, Purpose::Replace);
 }
 
 std::optional<Error> writeNewFileAtomically(const std::string& path, std::string_view content)
 {
-    const auto folder = openParent(path);
-    if (!folder)
-        return systemError(errno, path);
-    return write(folder, std::string(lastName(path)), content, path, Purpose::Make);
+    return write(path, content, Purpose::Make);
 }
 
 SystemError writeWhole(const FileDescriptor& file, std::string_view content)
@@ -126,21 +129,24 @@ platform::Result<std::string> readWholeFile(const std::string& path, std::size_t
 {
     const auto folder = openParent(path);
     if (!folder)
-        return systemError(errno, path);
-    return readWholeFile(folder, std::string(lastName(path)), maximumBytes, path);
+        return systemError(folder.error, path);
+    auto content = readWholeFile(*folder, std::string(lastName(path)), maximumBytes);
+    if (!content)
+        return systemError(content.error, path);
+    return std::move(*content);
 }
 
-platform::Result<std::string> readWholeFile(
-    const FileDescriptor& folder, const std::string& name, std::size_t maximumBytes, std::string_view path)
+SystemResult<std::string> readWholeFile(
+    const FileDescriptor& folder, const std::string& name, std::size_t maximumBytes)
 {
     // Without O_NONBLOCK, opening a named pipe would block until another program writes to it.
     constexpr int flags = O_RDONLY | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY;
     const FileDescriptor file(::openat(folder.get(), name.c_str(), flags));
     struct stat found;
     if (!file || ::fstat(file.get(), &found) != 0)
-        return systemError(errno, path);
+        return SystemError::last(name);
     if (!S_ISREG(found.st_mode))
-        return systemError(S_ISDIR(found.st_mode) ? EISDIR : ENXIO, path);
+        return SystemError(S_ISDIR(found.st_mode) ? EISDIR : ENXIO, name);
     std::string content;
     char piece[16 * 1024];
     for (;;) {
@@ -150,10 +156,10 @@ platform::Result<std::string> readWholeFile(
         if (length < 0 && errno == EINTR)
             continue;
         if (length < 0)
-            return systemError(errno, path);
+            return SystemError::last(name);
         content.append(piece, static_cast<std::size_t>(length));
         if (content.size() > maximumBytes)
-            return systemError(EFBIG, path);
+            return SystemError(EFBIG, name);
     }
 }
 

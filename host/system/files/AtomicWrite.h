@@ -19,9 +19,9 @@ namespace host::system {
 /// user alone. Answers the error; the old content is then untouched. Any thread; it waits for the disk.
 std::optional<platform::Error> writeFileAtomically(const std::string& path, std::string_view content);
 
-/// Writes a name in an open folder; `path` is used in the error only.
-std::optional<platform::Error> writeFileAtomically(
-    const FileDescriptor& folder, const std::string& name, std::string_view content, std::string_view path);
+/// Writes a name in an open folder.
+SystemError writeFileAtomically(
+    const FileDescriptor& folder, const std::string& name, std::string_view content);
 
 /// Writes a new file, whole or not at all. It never replaces a file (FileErrorCode::ItemExists). It is for
 /// content that could be made again, because it does not wait for the disk.
@@ -37,7 +37,7 @@ std::string uniqueName(std::string_view prefix);
 /// Reads a whole file of at most `maximumBytes` (else EFBIG). It opens only regular files and follows no link
 /// (ELOOP).
 platform::Result<std::string> readWholeFile(const std::string& path, std::size_t maximumBytes);
-platform::Result<std::string> readWholeFile(
-    const FileDescriptor& folder, const std::string& name, std::size_t maximumBytes, std::string_view path);
+SystemResult<std::string> readWholeFile(
+    const FileDescriptor& folder, const std::string& name, std::size_t maximumBytes);
 
 } // namespace host::system
