@@ -154,6 +154,7 @@ std::vector<double> floors(const std::string& path)
     const int queue = inotify_init1(IN_CLOEXEC);
     inotify_add_watch(queue, path.c_str(), IN_CREATE | IN_DELETE);
     std::vector<double> took;
+    took.reserve(changesTimed);
     for (int i = 0; i < changesTimed; ++i)
         took.push_back(floorOnce(queue, path + "/Photo of the sea.jpg"));
     ::close(queue);

@@ -37,10 +37,10 @@ std::string trimmed(std::string_view text)
 {
     const auto atStart = [&](std::string_view space) { return text.starts_with(space); };
     const auto atEnd = [&](std::string_view space) { return text.ends_with(space); };
-    for (auto* space = std::ranges::find_if(whiteSpace, atStart); space != std::end(whiteSpace);
+    for (const auto* space = std::ranges::find_if(whiteSpace, atStart); space != std::end(whiteSpace);
          space = std::ranges::find_if(whiteSpace, atStart))
         text.remove_prefix(space->size());
-    for (auto* space = std::ranges::find_if(whiteSpace, atEnd); space != std::end(whiteSpace);
+    for (const auto* space = std::ranges::find_if(whiteSpace, atEnd); space != std::end(whiteSpace);
          space = std::ranges::find_if(whiteSpace, atEnd))
         text.remove_suffix(space->size());
     return std::string(text);

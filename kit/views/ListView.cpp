@@ -65,8 +65,8 @@ void ListView::apply(const ListChanges& changes)
     if (changes.isEmpty())
         return;
     rowCountDidChange();
-    const bool mayHaveLost = std::any_of(changes.splices.begin(), changes.splices.end(),
-        [](const ListSplice& splice) { return splice.removed > 0; });
+    const bool mayHaveLost =
+        std::ranges::any_of(changes.splices, [](const ListSplice& splice) { return splice.removed > 0; });
     if (mayHaveLost && !_selection.isEmpty())
         _selection.keepOnly(rowIds());
     _listObserver.notify([&](ListViewObserver& observer) { observer.rowsDidChange(*this, changes); });
@@ -275,7 +275,7 @@ void ListView::contentOffsetDidChange()
 
 void ListView::updateVisibleRows(Tell tell)
 {
-    const double count = static_cast<double>(_rowCount);
+    const auto count = static_cast<double>(_rowCount);
     const double top = std::clamp(std::floor(contentOffset().y / _rowHeight), 0.0, count);
     const double bottom =
         std::clamp(std::ceil((contentOffset().y + bounds().height) / _rowHeight), top, count);

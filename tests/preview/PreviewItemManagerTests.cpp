@@ -13,8 +13,6 @@
 
 using namespace platform;
 using namespace tarrow;
-using screens::DocumentListController;
-using screens::PreviewContent;
 
 namespace {
 

@@ -5,7 +5,7 @@
 
 #include <memory>
 
-typedef struct _GAppLaunchContext GAppLaunchContext;
+using GAppLaunchContext = struct _GAppLaunchContext;
 
 namespace host::gtk {
 

@@ -9,7 +9,7 @@
 #include <memory>
 #include <string>
 
-typedef struct _GAppLaunchContext GAppLaunchContext;
+using GAppLaunchContext = struct _GAppLaunchContext;
 
 namespace host::system {
 

@@ -215,7 +215,7 @@ public:
     {
         kit::ListRow row;
         row.id = ids[index];
-        row.title = titles.count(row.id) ? titles.at(row.id) : "Row " + std::to_string(row.id);
+        row.title = titles.contains(row.id) ? titles.at(row.id) : "Row " + std::to_string(row.id);
         return row;
     }
     kit::RowId rowIdAtIndex(const kit::ListView&, std::size_t index) const override { return ids[index]; }

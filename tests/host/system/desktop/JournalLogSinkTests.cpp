@@ -16,7 +16,6 @@
 #include <vector>
 
 using namespace platform;
-using host::system::JournalLogSink;
 using host::system::LogSettings;
 
 namespace {
