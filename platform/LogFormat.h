@@ -56,16 +56,12 @@ std::string logText(const std::vector<T>& values)
 template <typename T>
 LogValue logValue(const T& value)
 {
-    if constexpr (std::is_same_v<T, bool>)
-        return static_cast<std::int64_t>(value);
-    else if constexpr (std::signed_integral<T>)
+    if constexpr (std::is_same_v<T, bool> || std::signed_integral<T> || std::is_enum_v<T>)
         return static_cast<std::int64_t>(value);
     else if constexpr (std::unsigned_integral<T>)
         return static_cast<std::uint64_t>(value);
     else if constexpr (std::floating_point<T>)
         return static_cast<double>(value);
-    else if constexpr (std::is_enum_v<T>)
-        return static_cast<std::int64_t>(value);
     else
         return logText(value);
 }
