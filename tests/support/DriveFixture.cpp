@@ -15,6 +15,7 @@
 #include "host/system/files/JsonKeyedArchiver.h"
 #include "host/system/files/JsonUserDefaults.h"
 #include "host/system/files/PosixFileSystem.h"
+#include "host/system/listing/ThreadedFolderLister.h"
 #include "host/system/search/IndexedNameSearch.h"
 #include "host/system/texts/GettextLocalization.h"
 #include "host/system/texts/IcuFormatters.h"
@@ -24,8 +25,7 @@
 #include <glib.h>
 #include <sys/xattr.h>
 
-#include <filesystem>
-#include <fstream>
+#include <algorithm>
 #include <stdexcept>
 
 namespace testing_support {
@@ -60,6 +60,12 @@ const std::shared_ptr<host::system::GettextLocalization>& englishTexts()
 
 } // namespace
 
+std::string contentOf(const std::string& path)
+{
+    std::ifstream file(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(file), {}};
+}
+
 DriveFixture::DriveFixture()
 {
     const auto layout = DriveLayout::at(_folder.at("drive"));
@@ -68,7 +74,7 @@ DriveFixture::DriveFixture()
         std::filesystem::create_directories(layout.defaultContainer() + '/' + name);
     std::filesystem::create_directories(layout.trash());
 
-    platform::ServiceSet set;
+    auto& set = installed;
     set.dispatch = dispatch;
     set.notificationCenter = notifications;
     // Presenters answer on queues that only this thread runs.
@@ -86,6 +92,7 @@ DriveFixture::DriveFixture()
     set.localization = englishTexts();
     set.typeRegistry = types();
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(set.typeRegistry);
+    set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(dispatch, types(), "en_US");
     set.nameSearch = std::make_shared<host::system::IndexedNameSearch>(dispatch, types());
     set.keyedArchiver = std::make_shared<host::system::JsonKeyedArchiver>();
     set.userDefaults = std::make_shared<host::system::JsonUserDefaults>(layout.defaults(), *dispatch);
@@ -101,7 +108,7 @@ DriveFixture::DriveFixture()
     set.storageOfferManager = cloud->storageOffers();
     set.keyValueStore = cloud->keyValueStore();
     set.fileCoordinator = fileCoordinator;
-    platform::installServices(std::move(set));
+    platform::installServices(set);
 }
 
 DriveFixture::~DriveFixture()
@@ -169,6 +176,15 @@ void DriveFixture::mark(const Url& url, const char* attribute, std::string_view 
 {
     if (::lsetxattr(url.path().c_str(), attribute, value.data(), value.size(), 0) != 0)
         throw std::runtime_error("cannot set an attribute of " + url.path());
+}
+
+bool DriveFixture::hasTraces() const
+{
+    return std::ranges::any_of(
+        std::filesystem::recursive_directory_iterator(layout().home()), [](const auto& entry) {
+            const auto name = entry.path().filename().string();
+            return name.starts_with(".trw") || name.ends_with(".place");
+        });
 }
 
 void DriveFixture::signIn(const std::string& name) const

@@ -13,11 +13,22 @@
 #include "tests/support/TemporaryDirectory.h"
 #include "tests/support/VirtualDispatch.h"
 
+#include <gmock/gmock.h>
+
+#include <filesystem>
+#include <fstream>
 #include <memory>
 #include <string>
 #include <string_view>
 
 namespace testing_support {
+
+/// Answers the content of a file; empty when there is none.
+std::string contentOf(const std::string& path);
+inline std::string contentOf(const platform::Url& url)
+{
+    return contentOf(url.path());
+}
 
 /// A drive in a temporary folder, with an account signed in and the host's real services installed, on queues
 /// and a clock that the test controls. Relative paths below start at the drive's top level
@@ -50,6 +61,9 @@ public:
     /// Sets an extended attribute. The names are in host::drive::itemMark.
     void mark(const platform::Url& url, const char* attribute, std::string_view value) const;
 
+    /// Answers whether a change left a temporary file below the drive.
+    bool hasTraces() const;
+
     void signIn(const std::string& name) const;
     void signOut() const;
     /// Delivers the notices of changes on disk so far and runs all work that is due.
@@ -64,6 +78,8 @@ private:
     TemporaryDirectory _folder;
 
 public:
+    /// These services are installed; a fixture that replaces some of them installs a changed copy.
+    platform::ServiceSet installed;
     /// The service behind the installed set's cloudDocumentService.
     std::shared_ptr<host::drive::LocalCloudDocumentService> cloud;
     /// The installed set's activityHandOver, which is this device's.

@@ -10,8 +10,7 @@ namespace testing_support {
 
 namespace {
 
-using platform::Duration;
-using platform::Work;
+using namespace platform;
 
 class VirtualQueue : public platform::Queue, public std::enable_shared_from_this<VirtualQueue> {
 public:

@@ -3,11 +3,7 @@
 
 #include "tests/browser/support/BrowserFixture.h"
 
-#include "host/system/desktop/MimeTypeRegistry.h"
-#include "host/system/desktop/TypePreviewSupport.h"
-#include "host/system/listing/ThreadedFolderLister.h"
 #include "host/system/texts/GettextLocalization.h"
-#include "host/system/texts/IcuFormatters.h"
 #include "host/system/texts/UserLocale.h"
 #include "kit/controllers/AlertController.h"
 #include "kit/controllers/Window.h"
@@ -30,43 +26,17 @@ std::shared_ptr<platform::Localization> englishTexts()
         TRW_LOCALE_FOLDER, host::system::UserLocale{"en", "en_US"});
 }
 
-/// Answers a service of a set without owning it.
-template <typename T>
-std::shared_ptr<T> borrowed(T& service)
-{
-    return std::shared_ptr<T>(std::shared_ptr<void>(), &service);
-}
-
 } // namespace
 
 BrowserFixture::BrowserFixture()
 {
     cloud = std::make_shared<SimulatedCloud>(drive.cloud);
-    const auto types = std::make_shared<host::system::MimeTypeRegistry>();
-    platform::ServiceSet set;
-    set.activityHandOver = drive.handOver;
+    auto set = drive.installed;
     set.appRegistry = apps;
-    set.characterData = borrowed(_driveServices.characterData());
     set.cloudDocumentService = cloud;
-    set.dispatch = drive.dispatch;
     set.documentSharing = std::make_shared<RecordingSharing>();
-    set.fileChanges = borrowed(_driveServices.fileChanges());
-    set.fileCoordinator = borrowed(_driveServices.fileCoordinator());
-    set.fileSystem = borrowed(_driveServices.fileSystem());
-    set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(drive.dispatch, types, "en_US");
-    set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
-    set.imageLoader = borrowed(_driveServices.imageLoader());
-    set.pagedDocumentOpener = borrowed(_driveServices.pagedDocumentOpener());
-    set.textDecoder = borrowed(_driveServices.textDecoder());
-    set.keyValueStore = borrowed(_driveServices.keyValueStore());
-    set.keyedArchiver = borrowed(_driveServices.keyedArchiver());
     set.localization = englishTexts();
-    set.nameSearch = borrowed(_driveServices.nameSearch());
-    set.notificationCenter = drive.notifications;
-    set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(types);
     set.storageOfferManager = offers;
-    set.typeRegistry = types;
-    set.userDefaults = borrowed(_driveServices.userDefaults());
     platform::installServices(std::move(set));
 }
 

@@ -12,13 +12,6 @@
 #include "tests/support/SimulatedCloud.h"
 #include "tests/support/SimulatedOffers.h"
 
-#include <gtest/gtest.h>
-
-#include <memory>
-#include <string>
-#include <string_view>
-#include <vector>
-
 namespace screens {
 class DocumentListController;
 }
@@ -68,9 +61,6 @@ protected:
     std::shared_ptr<SimulatedOffers> offers = std::make_shared<SimulatedOffers>();
     std::shared_ptr<kit::Window> window;
     std::shared_ptr<tarrow::NavController> browser;
-
-private:
-    platform::Services _driveServices = platform::services();
 };
 
 } // namespace testing_support

@@ -4,7 +4,7 @@
 #pragma once
 
 #include "platform/CloudDocumentService.h"
-#include "platform/FileCoordinator.h"
+#include "tests/support/ForwardingCoordinator.h"
 
 #include <functional>
 #include <memory>
@@ -18,46 +18,19 @@ using platform::Result;
 using platform::Url;
 
 /// Refuses to coordinate, or sends readers to another location than the one they asked for.
-class DecoratedCoordinator : public platform::FileCoordinator {
+class DecoratedCoordinator : public testing_support::ForwardingCoordinator {
 public:
-    std::optional<Error> refusal;
+    using ForwardingCoordinator::ForwardingCoordinator;
+    Failure refusal;
     std::optional<Url> elsewhere;
     int reads = 0;
 
-    explicit DecoratedCoordinator(std::shared_ptr<platform::FileCoordinator> real)
-        : _real(std::move(real))
-    {
-    }
-    std::optional<Error> coordinateReading(
+    Failure coordinateReading(
         const Url& url, platform::ReadingOptions options, const Accessor& accessor) override
     {
         ++reads;
-        return refusal ? refusal : _real->coordinateReading(elsewhere.value_or(url), options, accessor);
+        return refusal ? refusal : real->coordinateReading(elsewhere.value_or(url), options, accessor);
     }
-    std::optional<Error> coordinateWriting(
-        const Url& url, platform::WritingOptions options, const Accessor& accessor) override
-    {
-        return refusal ? refusal : _real->coordinateWriting(elsewhere.value_or(url), options, accessor);
-    }
-    std::optional<Error> coordinateWriting(const Url& first, platform::WritingOptions firstOptions,
-        const Url& second, platform::WritingOptions secondOptions, const PairAccessor& accessor) override
-    {
-        return refusal ? refusal
-                       : _real->coordinateWriting(first, firstOptions, second, secondOptions, accessor);
-    }
-    void itemWillMove(const Url& from, const Url& to) override { _real->itemWillMove(from, to); }
-    void itemDidMove(const Url& from, const Url& to) override { _real->itemDidMove(from, to); }
-    void addFilePresenter(const std::shared_ptr<platform::FilePresenter>& presenter) override
-    {
-        _real->addFilePresenter(presenter);
-    }
-    void removeFilePresenter(const platform::FilePresenter& presenter) override
-    {
-        _real->removeFilePresenter(presenter);
-    }
-
-private:
-    std::shared_ptr<platform::FileCoordinator> _real;
 };
 
 /// The real items, whose attributes a test may change before they are handed out.

@@ -3,18 +3,7 @@
 
 #include "tests/items/support/ItemsFixture.h"
 
-#include "host/system/desktop/MimeTypeRegistry.h"
-#include "host/system/desktop/TypePreviewSupport.h"
-#include "host/system/files/JsonKeyedArchiver.h"
-#include "host/system/files/JsonUserDefaults.h"
-#include "host/system/files/PosixFileSystem.h"
-#include "host/system/listing/ThreadedFolderLister.h"
-#include "host/system/texts/IcuFormatters.h"
-#include "host/system/texts/UnicodeCharacterData.h"
 #include "platform/Services.h"
-
-#include <filesystem>
-#include <fstream>
 
 namespace items_tests {
 
@@ -22,30 +11,11 @@ ItemsFixture::ItemsFixture()
 {
     decorated = std::make_shared<DecoratedCloud>(DriveFixture::cloud);
     coordinator = std::make_shared<DecoratedCoordinator>(fileCoordinator);
-    platform::ServiceSet set;
-    set.appRegistry = apps;
-    set.characterData = std::make_shared<host::system::UnicodeCharacterData>();
-    set.cloudDocumentService = decorated;
-    set.dispatch = dispatch;
-    set.fileCoordinator = coordinator;
-    set.fileChanges = DriveFixture::cloud->fileChanges();
-    set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
-    set.formatters = std::make_shared<host::system::IcuFormatters>("en_US", "UTC");
-    set.localization = texts;
-    set.notificationCenter = notifications;
-    const auto types = std::make_shared<host::system::MimeTypeRegistry>();
-    set.typeRegistry = types;
-    set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(dispatch, types, "en_US");
-    set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(set.typeRegistry);
-    // A list reads its last order from these two.
-    set.keyedArchiver = std::make_shared<host::system::JsonKeyedArchiver>();
-    set.userDefaults = std::make_shared<host::system::JsonUserDefaults>(layout().defaults(), *dispatch);
-    platform::installServices(std::move(set));
-}
-
-ItemsFixture::~ItemsFixture()
-{
-    platform::installServices({});
+    installed.appRegistry = apps;
+    installed.cloudDocumentService = decorated;
+    installed.fileCoordinator = coordinator;
+    installed.localization = texts;
+    platform::installServices(installed);
 }
 
 void ItemsFixture::changeValues(std::function<void(const Url&, AttributeMap&)> change)

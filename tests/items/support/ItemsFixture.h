@@ -10,8 +10,6 @@
 #include "tests/support/DriveFixture.h"
 #include "tests/support/SimulatedApps.h"
 
-#include <gtest/gtest.h>
-
 namespace items_tests {
 
 /// English texts, which are written from left to right unless a test changes that.
@@ -29,7 +27,6 @@ public:
 class ItemsFixture : public testing::Test, public testing_support::DriveFixture {
 protected:
     ItemsFixture();
-    ~ItemsFixture() override;
 
     Url at(std::string_view relativePath) const { return url(relativePath); }
     /// Answers the documents folder of the default container.

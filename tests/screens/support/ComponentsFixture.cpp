@@ -3,8 +3,6 @@
 
 #include "tests/screens/support/ComponentsFixture.h"
 
-#include "host/system/desktop/MimeTypeRegistry.h"
-#include "host/system/listing/ThreadedFolderLister.h"
 #include "kit/views/ListView.h"
 
 #include <chrono>
@@ -15,22 +13,11 @@ namespace testing_support {
 using platform::Url;
 using screens::DocumentListController;
 
-namespace {
-
-/// Answers a service of a set without owning it.
-template <typename T>
-std::shared_ptr<T> borrowed(T& service)
-{
-    return std::shared_ptr<T>(std::shared_ptr<void>(), &service);
-}
-
-} // namespace
-
 std::optional<platform::Error> CountingCoordinator::coordinateReading(
     const Url& url, platform::ReadingOptions options, const Accessor& accessor)
 {
     _names.push_back(url.lastPathComponent());
-    return _real.coordinateReading(url, options, accessor);
+    return real->coordinateReading(url, options, accessor);
 }
 
 std::vector<std::string> CountingCoordinator::takeReads()
@@ -80,38 +67,23 @@ std::vector<std::string> RecordingListDelegate::take()
 
 ComponentsFixture::ComponentsFixture()
 {
-    coordinator = std::make_shared<CountingCoordinator>(_driveServices.fileCoordinator());
-    _set.activityHandOver = drive.handOver;
-    _set.appRegistry = apps;
-    _set.characterData = borrowed(_driveServices.characterData());
-    _set.cloudDocumentService = drive.cloud;
-    _set.documentSharing = sharing;
-    _set.dispatch = drive.dispatch;
-    _set.fileChanges = borrowed(_driveServices.fileChanges());
-    _set.fileCoordinator = coordinator;
-    _set.fileSystem = borrowed(_driveServices.fileSystem());
-    _set.folderLister = lister;
-    _set.formatters = borrowed(_driveServices.formatters());
-    _set.imageLoader = borrowed(_driveServices.imageLoader());
-    _set.linkOpener = links;
-    _set.localization = borrowed(_driveServices.localization());
-    _set.nameSearch = borrowed(_driveServices.nameSearch());
-    _set.notificationCenter = drive.notifications;
-    _set.pagedDocumentOpener = borrowed(_driveServices.pagedDocumentOpener());
-    _set.textDecoder = borrowed(_driveServices.textDecoder());
-    _set.previewSupport = borrowed(_driveServices.previewSupport());
-    _set.storageOfferManager = borrowed(_driveServices.storageOfferManager());
-    _set.typeRegistry = borrowed(_driveServices.typeRegistry());
-    _set.keyedArchiver = borrowed(_driveServices.keyedArchiver());
-    _set.userDefaults = borrowed(_driveServices.userDefaults());
-    platform::installServices(_set);
+    install(lister);
 }
 
 void ComponentsFixture::useRealLister()
 {
-    static const auto types = std::make_shared<const host::system::MimeTypeRegistry>();
-    _set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(drive.dispatch, types, "en_US");
-    platform::installServices(_set);
+    install(drive.installed.folderLister);
+}
+
+void ComponentsFixture::install(std::shared_ptr<platform::FolderLister> folderLister)
+{
+    auto set = drive.installed;
+    set.appRegistry = apps;
+    set.documentSharing = sharing;
+    set.fileCoordinator = coordinator;
+    set.folderLister = std::move(folderLister);
+    set.linkOpener = links;
+    platform::installServices(std::move(set));
 }
 
 bool ComponentsFixture::waitUntil(const std::function<bool()>& condition)

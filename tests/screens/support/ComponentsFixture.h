@@ -3,65 +3,29 @@
 
 #pragma once
 
-#include "platform/FileCoordinator.h"
 #include "platform/LinkOpener.h"
 #include "platform/Services.h"
 #include "screens/list/DocumentListController.h"
 #include "screens/list/DocumentListControllerDelegate.h"
 #include "tests/screens/support/HandLister.h"
 #include "tests/support/DriveFixture.h"
+#include "tests/support/ForwardingCoordinator.h"
 #include "tests/support/RecordingSharing.h"
 #include "tests/support/SimulatedApps.h"
 
-#include <gtest/gtest.h>
-
 #include <functional>
-#include <memory>
-#include <string>
-#include <vector>
 
 namespace testing_support {
 
 /// Counts the reads that go through it to the real coordinator.
-class CountingCoordinator : public platform::FileCoordinator {
+class CountingCoordinator : public ForwardingCoordinator {
 public:
-    explicit CountingCoordinator(platform::FileCoordinator& real)
-        : _real(real)
-    {
-    }
-    std::optional<platform::Error> coordinateReading(
-        const platform::Url& url, platform::ReadingOptions options, const Accessor& accessor) override;
-    std::optional<platform::Error> coordinateWriting(
-        const platform::Url& url, platform::WritingOptions options, const Accessor& accessor) override
-    {
-        return _real.coordinateWriting(url, options, accessor);
-    }
-    std::optional<platform::Error> coordinateWriting(const platform::Url& first,
-        platform::WritingOptions firstOptions, const platform::Url& second,
-        platform::WritingOptions secondOptions, const PairAccessor& accessor) override
-    {
-        return _real.coordinateWriting(first, firstOptions, second, secondOptions, accessor);
-    }
-    void itemWillMove(const platform::Url& from, const platform::Url& to) override
-    {
-        _real.itemWillMove(from, to);
-    }
-    void itemDidMove(const platform::Url& from, const platform::Url& to) override
-    {
-        _real.itemDidMove(from, to);
-    }
-    void addFilePresenter(const std::shared_ptr<platform::FilePresenter>& presenter) override
-    {
-        _real.addFilePresenter(presenter);
-    }
-    void removeFilePresenter(const platform::FilePresenter& presenter) override
-    {
-        _real.removeFilePresenter(presenter);
-    }
+    using ForwardingCoordinator::ForwardingCoordinator;
+    Failure coordinateReading(
+        const Url& url, platform::ReadingOptions options, const Accessor& accessor) override;
     std::vector<std::string> takeReads();
 
 private:
-    platform::FileCoordinator& _real;
     std::vector<std::string> _names;
 };
 
@@ -129,12 +93,12 @@ protected:
     std::shared_ptr<RecordingLinks> links = std::make_shared<RecordingLinks>();
     std::shared_ptr<RecordingSharing> sharing = std::make_shared<RecordingSharing>();
     std::shared_ptr<SimulatedApps> apps = std::make_shared<SimulatedApps>();
-    std::shared_ptr<CountingCoordinator> coordinator;
+    std::shared_ptr<CountingCoordinator> coordinator =
+        std::make_shared<CountingCoordinator>(drive.fileCoordinator);
     std::shared_ptr<RecordingListDelegate> delegate = std::make_shared<RecordingListDelegate>();
 
 private:
-    platform::Services _driveServices = platform::services();
-    platform::ServiceSet _set;
+    void install(std::shared_ptr<platform::FolderLister> folderLister);
 };
 
 } // namespace testing_support

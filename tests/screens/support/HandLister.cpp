@@ -7,9 +7,7 @@
 
 namespace testing_support {
 
-using platform::FolderSnapshot;
-using platform::ListingStage;
-using platform::Url;
+using namespace platform;
 
 struct HandLister::Listing : platform::FolderListing {
     Listing(Url listed, std::vector<FolderSnapshot::ExtraItem> items, Update callback)
