@@ -5,22 +5,18 @@
 #include "platform/FilePresenter.h"
 #include "tests/items/support/ItemsFixture.h"
 
-#include <gmock/gmock.h>
-
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
 #include <cerrno>
-#include <filesystem>
-#include <fstream>
 #include <map>
 
 using namespace tarrow;
 using items_tests::ItemsFixture;
 using items_tests::writeFile;
-using testing::ElementsAre;
-using testing::StartsWith;
+using namespace testing;
+using testing_support::contentOf;
 
 namespace {
 
@@ -68,17 +64,6 @@ protected:
     {
         return Url::fileURL(host::drive::PromiseRecord::pathFor(url.path()));
     }
-    static std::string contentOf(const Url& url)
-    {
-        std::ifstream file(url.path());
-        return {std::istreambuf_iterator<char>(file), {}};
-    }
-    /// Checks that the operations on items left no temporary files.
-    void expectNoTraces() const
-    {
-        for (const auto& entry : fs::recursive_directory_iterator(layout().home()))
-            EXPECT_FALSE(entry.path().filename().string().starts_with(".trw")) << entry.path();
-    }
     Url outside(const std::string& name) { return writeFile(folder().at("outside/" + name), "precious"); }
 
     std::shared_ptr<platform::OperationQueue> _queue =
@@ -101,21 +86,6 @@ TEST_F(FileChangesTest, MakesAFolderAndThoseOnTheWay)
             StartsWith("DEBUG Coordinated Write returned ")));
     EXPECT_TRUE(FileUtils::isDir(url));
     EXPECT_FALSE(FileUtils::mkdir(url)) << "a folder that is there is made";
-
-    const auto file = writeDocument("file");
-    fs::create_directory_symlink(folder().path(), at("out").path());
-    struct Row {
-        Url url;
-        int code;
-    };
-    for (const auto& [refused, code] :
-        {Row{file, 516}, Row{at("file/a"), 516}, Row{at("out/a"), 516}, Row{at(std::string(256, 'n')), 514},
-            Row{at("../../../a"), EINVAL}, Row{Url::fileURL(folder().at("a")), EXDEV}}) {
-        log->clear();
-        EXPECT_THAT(FileUtils::mkdir(refused), HasCode(code)) << refused.path();
-        EXPECT_THAT(log->lines(), testing::Contains(StartsWith("ERROR failed to create directory:'")));
-    }
-    EXPECT_FALSE(fs::exists(folder().at("a")));
 }
 
 TEST_F(FileChangesTest, RemovesWhatItWasAskedToAndNothingElse)
@@ -144,7 +114,7 @@ TEST_F(FileChangesTest, RemovesWhatItWasAskedToAndNothingElse)
     }
     EXPECT_FALSE(isThere(content));
     EXPECT_EQ(contentOf(kept), "precious");
-    expectNoTraces();
+    EXPECT_FALSE(hasTraces());
     // A missing file has no date, so nothing shows that it is unchanged.
     EXPECT_THAT(FileUtils::remove(file), HasCode(FileErrorCode::Cancelled));
 }
@@ -170,34 +140,6 @@ TEST_F(FileChangesTest, KeepsADocumentThatChangedWhileItWasBeingDeleted)
         EXPECT_EQ(contentOf(url), content);
     }
     EXPECT_FALSE(FileUtils::remove(url));
-}
-
-TEST_F(FileChangesTest, MovesOnlyToAFreePlaceOfTheSameKind)
-{
-    const auto file = writeDocument("a.txt", "a"), other = writeDocument("b.txt", "b");
-    const auto dir = makeFolder("dir"), otherDir = makeFolder("dir2"), gone = at("gone");
-    const auto promised = writePromise("p.txt", {});
-    const auto link = writeLink("dangling", "nowhere");
-    struct Row {
-        Url from, to;
-        int code;
-    };
-    for (const auto& [from, to, code] :
-        {Row{file, dir, 3328}, Row{dir, file, 3328}, Row{file, other, 516}, Row{dir, otherDir, 516},
-            Row{file, promised, 516}, Row{promised, file, 516}, Row{file, link, 516},
-            Row{dir, dir.appendingPathComponent("in"), EINVAL}, Row{gone, at("new"), 4},
-            Row{file, at("gone/a.txt"), 4}, Row{file, at(std::string(256, 'n')), 514},
-            Row{file, Url::fileURL(folder().at("a.txt")), EXDEV}}) {
-        const auto error = FileUtils::moveTo(from, to);
-        EXPECT_THAT(error, HasCode(code)) << from.path() << " to " << to.path();
-        log->clear();
-    }
-    EXPECT_FALSE(FileUtils::moveTo(file, file));
-    EXPECT_EQ(log->count("DEBUG Move: src and dest are the same"), 1U);
-    EXPECT_EQ(contentOf(file), "a");
-    EXPECT_EQ(contentOf(other), "b");
-    EXPECT_TRUE(isThere(promiseOf(promised)) && FileUtils::isDir(dir));
-    expectNoTraces();
 }
 
 TEST_F(FileChangesTest, MovesAnItemAndTellsItsPresenters)
@@ -263,21 +205,22 @@ TEST_F(FileChangesTest, AFolderSwappedForALinkLeadsNowhere)
 std::map<std::string, std::string> everything(const std::string& folder)
 {
     std::map<std::string, std::string> found;
-    for (const auto& entry : fs::recursive_directory_iterator(folder)) {
-        std::ifstream file(entry.path());
+    for (const auto& entry : fs::recursive_directory_iterator(folder))
         found[entry.path()] = entry.is_symlink() ? fs::read_symlink(entry.path()).string()
             : entry.is_directory()               ? "folder"
-                                                 : std::string(std::istreambuf_iterator<char>(file), {});
-    }
+                                                 : contentOf(entry.path().string());
     return found;
 }
 
-TEST_F(FileChangesTest, BadInputIsToldAndChangesNothing)
+TEST_F(FileChangesTest, WhatCannotBeDoneIsToldAndChangesNothing)
 {
-    const auto file = writeDocument("a.txt", "a"), folder = makeFolder("folder");
+    const auto file = writeDocument("a.txt", "a"), other = writeDocument("b.txt", "b");
+    const auto dir = makeFolder("folder"), otherDir = makeFolder("folder2");
     writeDocument("folder/b.txt", "b");
-    writeLink("link", folder.path());
-    const auto promised = writePromise("p.txt", {});
+    writeLink("link", dir.path());
+    const auto dangling = writeLink("dangling", "nowhere"), promised = writePromise("p.txt", {});
+    const auto elsewhere = Url::fileURL(folder().at("elsewhere"));
+    fs::create_directory_symlink(folder().path(), at("out").path());
     std::string composed, decomposed; // 128 letters: 256 and 384 bytes
     for (int i = 0; i < 128; ++i) {
         composed += "\u00e9";
@@ -290,6 +233,8 @@ TEST_F(FileChangesTest, BadInputIsToldAndChangesNothing)
         int code;
     };
     const auto before = everything(layout().documents());
+    EXPECT_FALSE(FileUtils::moveTo(file, file));
+    EXPECT_EQ(log->count("DEBUG Move: src and dest are the same"), 1U);
     const Row rows[] = {
         {"256 bytes", FileUtils::mkdir(at(composed)), 514},
         {"384 bytes of as many letters", FileUtils::moveTo(file, at(decomposed)), 514},
@@ -298,20 +243,38 @@ TEST_F(FileChangesTest, BadInputIsToldAndChangesNothing)
             514},
         {"eviction under such a name", DriveFixture::cloud->fileChanges()->evictItem(tooLongToEvict.path()),
             514},
-        {"a folder into itself", FileUtils::moveTo(folder, at("folder/in")), EINVAL},
-        {"a folder into itself by a link", FileUtils::moveTo(folder, at("link/in")), ENOTDIR},
+        {"a folder into itself", FileUtils::moveTo(dir, at("folder/in")), EINVAL},
+        {"a folder into itself by a link", FileUtils::moveTo(dir, at("link/in")), ENOTDIR},
         {"a file into a link", FileUtils::moveTo(file, at("link/a.txt")), ENOTDIR},
-        {"below a file", FileUtils::mkdir(at("a.txt/x")), 516},
+        {"a folder in place of a file", FileUtils::mkdir(file), 516},
+        {"a folder below a file", FileUtils::mkdir(at("a.txt/x")), 516},
+        {"a folder below a link", FileUtils::mkdir(at("out/x")), 516},
+        {"upwards", FileUtils::mkdir(at("../../../a")), EINVAL},
+        {"a folder elsewhere", FileUtils::mkdir(elsewhere), EXDEV},
+        {"a file elsewhere", FileUtils::moveTo(file, elsewhere), EXDEV},
         {"the drive itself", FileUtils::moveTo(Url::fileURL(layout().documents()), at("x")), EXDEV},
         {"a NUL", FileUtils::mkdir(Url::fileURL(at("a").path() + std::string(1, '\0') + "b")), 514},
+        {"a file onto a folder", FileUtils::moveTo(file, dir), 3328},
+        {"a folder onto a file", FileUtils::moveTo(dir, file), 3328},
+        {"a file onto a file", FileUtils::moveTo(file, other), 516},
+        {"a folder onto a folder", FileUtils::moveTo(dir, otherDir), 516},
+        {"a file onto a promise", FileUtils::moveTo(file, promised), 516},
+        {"a promise onto a file", FileUtils::moveTo(promised, file), 516},
+        {"a file onto a link to nowhere", FileUtils::moveTo(file, dangling), 516},
+        {"nothing", FileUtils::moveTo(at("gone"), at("new")), 4},
+        {"a file into no folder", FileUtils::moveTo(file, at("gone/a.txt")), 4},
     };
     for (const auto& [name, error, code] : rows) {
         EXPECT_THAT(error, HasCode(code)) << name;
-        EXPECT_FALSE(error && error->text(platform::errorKey::localizedDescription).value_or("").empty())
-            << name;
+        const bool isExplained =
+            error && !error->text(platform::errorKey::localizedDescription).value_or("").empty();
+        EXPECT_EQ(isExplained, code != 3328)
+            << name << ": the change of an item's kind has no words of its own";
     }
+    EXPECT_THAT(log->lines(), testing::Contains(StartsWith("ERROR failed to create directory:'")));
     EXPECT_EQ(everything(layout().documents()), before);
-    expectNoTraces();
+    EXPECT_FALSE(isThere(elsewhere));
+    EXPECT_FALSE(hasTraces());
 }
 
 TEST_F(FileChangesTest, NamesThatDifferByAnyByteAreItemsOfTheirOwn)
@@ -335,7 +298,7 @@ TEST_F(FileChangesTest, NamesThatDifferByAnyByteAreItemsOfTheirOwn)
         EXPECT_FALSE(FileUtils::remove(target)) << name;
         EXPECT_EQ(contentOf(source), "second") << name;
     }
-    expectNoTraces();
+    EXPECT_FALSE(hasTraces());
 }
 
 TEST_F(FileChangesTest, WithoutPermissionAllStaysAsItIs)
@@ -377,7 +340,7 @@ TEST_F(FileChangesTest, WithoutPermissionAllStaysAsItIs)
         GTEST_SKIP() << "no other user can be taken here";
     EXPECT_EQ(status, 0);
     EXPECT_EQ(everything(layout().documents()), before);
-    expectNoTraces();
+    EXPECT_FALSE(hasTraces());
 }
 
 TEST_F(FileChangesTest, EvictsADocumentAndKeepsWhatIsKnownOfIt)

@@ -4,14 +4,11 @@
 #include "items/LaunchUtils.h"
 #include "tests/items/support/ItemsFixture.h"
 
-#include <gmock/gmock.h>
-
 namespace tarrow {
 namespace {
 
 using items_tests::ItemsFixture;
-using testing::ElementsAre;
-using testing::IsEmpty;
+using namespace testing;
 using testing_support::SimulatedApps;
 
 class LaunchUtilsTest : public ItemsFixture {
@@ -101,28 +98,6 @@ TEST_F(LaunchUtilsTest, ALibrarysOwnAppComesFirst)
     describeContainer("empty", "{}");
     EXPECT_EQ(appFor(Url::fileURL(layout().containerDocuments("empty") + "/a.txt")), "");
     EXPECT_EQ(appFor(Url::fileURL("/outside/a.txt")), "");
-}
-
-TEST_F(LaunchUtilsTest, OpeningTellsWhetherTheAppStarted)
-{
-    const auto library = describeContainer("box", R"({"owningApps": ["painter"]})");
-    const auto document = items_tests::writeFile(library.path() + "/a.txt", "1");
-    const auto reference = writeReference("pointer.txt.trwref", "box", "a.txt");
-    const auto open = [](const Url& url) {
-        return LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(url, nullptr, true);
-    };
-    EXPECT_FALSE(open(document));
-    setOwners({painter});
-    apps->known = {painter};
-    apps->appsStart = false;
-    EXPECT_FALSE(open(document));
-    EXPECT_THAT(apps->opened, IsEmpty());
-    apps->appsStart = true;
-    EXPECT_TRUE(open(document));
-    EXPECT_TRUE(open(reference));
-    EXPECT_THAT(apps->opened,
-        ElementsAre(SimulatedApps::Opened{document, "painter"}, SimulatedApps::Opened{document, "painter"}))
-        << "an app gets the document, not the reference";
 }
 
 } // namespace

@@ -5,15 +5,12 @@
 #include "platform/TypeRegistry.h"
 #include "tests/items/support/ItemsFixture.h"
 
-#include <gmock/gmock.h>
-
-#include <filesystem>
+#include <sys/stat.h>
 
 using namespace tarrow;
 using host::drive::PromiseRecord;
 using items_tests::ItemsFixture;
-using testing::ElementsAre;
-using testing::IsEmpty;
+using namespace testing;
 
 namespace {
 
@@ -62,15 +59,7 @@ TEST_F(RecordTest, ReadsALocalFile)
     const auto url = writeDocument("a file.txt", "12345");
     const auto item = DRItem::initWithURL(url);
     ASSERT_TRUE(item);
-    EXPECT_EQ(item->fileSize(), 5U);
     EXPECT_FALSE(item->localizedTypeDescription().empty());
-    EXPECT_TRUE(item->renameable());
-    EXPECT_FALSE(item->isDirectory());
-    EXPECT_FALSE(item->isPackage());
-    EXPECT_FALSE(item->isContainer());
-    EXPECT_FALSE(item->isSymlink());
-    EXPECT_FALSE(item->isBookmark());
-    EXPECT_FALSE(item->isPromise());
     EXPECT_TRUE(item->promiseURL()->isSameObject(*item->resolvedURL()));
     EXPECT_EQ(item->description(),
         "Name=a file.txt, Size=5, URL=" + url.absoluteString()
@@ -120,15 +109,6 @@ TEST_F(RecordTest, SumsAPackageThatHasNoSizeOfItsOwn)
     EXPECT_EQ(empty->fileSize(), std::nullopt);
     EXPECT_THAT(empty->friendlyFileSize(), IsEmpty());
     EXPECT_FALSE(empty->isDirectory());
-}
-
-TEST_F(RecordTest, LogsWhatItCannotSum)
-{
-    EXPECT_EQ(DRItem::sizeOfPackage(std::nullopt), 0U);
-    EXPECT_EQ(log->count("ERROR sizeOfPackage: null URL"), 1U);
-    EXPECT_EQ(DRItem::sizeOfPackage(at("missing")), 0U);
-    EXPECT_THAT(log->lines(),
-        testing::Contains(testing::StartsWith("INFO Error enumerating " + at("missing").absoluteString())));
 }
 
 TEST_F(RecordTest, ShowsAContainerUnderItsOwnName)
@@ -244,21 +224,12 @@ TEST_F(RecordTest, ReadsAnewOnlyForAnotherUrl)
     EXPECT_TRUE(item->canPreview());
 }
 
-TEST_F(RecordTest, IsNotBuiltForWhatIsNotThere)
+TEST_F(RecordTest, IsNotBuiltForWhatIsNotThereOrWithoutAUrl)
 {
-    const auto url = at("gone.txt");
-    EXPECT_FALSE(DRItem::initWithURL(url));
-    EXPECT_EQ(log->count("ERROR Failed to cache values for URL " + url.absoluteString()), 1U);
-}
-
-TEST_F(RecordTest, IsNotBuiltWithoutAUrl)
-{
-    try {
-        DRItem::init();
-        FAIL() << "a record without a URL was built";
-    } catch (const std::invalid_argument& error) {
-        EXPECT_STREQ(error.what(), "Don't call -[DRItem init].");
-    }
+    EXPECT_FALSE(DRItem::initWithURL(at("gone.txt")));
+    EXPECT_EQ(log->count("ERROR Failed to cache values for URL " + at("gone.txt").absoluteString()), 1U);
+    EXPECT_THAT(
+        [] { DRItem::init(); }, testing::ThrowsMessage<std::invalid_argument>("Don't call -[DRItem init]."));
 }
 
 TEST_F(RecordTest, FormatsDatesWithTheShortTime)
@@ -268,6 +239,174 @@ TEST_F(RecordTest, FormatsDatesWithTheShortTime)
         services().formatters().date(*item->creationDate(), DateStyle::Long, DateStyle::Short));
     item->setContentModificationDate(std::nullopt);
     EXPECT_EQ(item->friendlyContentModificationDate(DateStyle::Long), std::nullopt);
+}
+
+class RecordFaultTest : public ItemsFixture {
+protected:
+    void makeUnreachable()
+    {
+        decorated->decoratedItems.unreachable = Error(platform::errorDomain::system, 5);
+    }
+};
+
+TEST_F(RecordFaultTest, FallsBackToThePlainFileSystem)
+{
+    const auto url = writeDocument("Notes/a.txt", "12345");
+    makeUnreachable();
+    const auto item = DRItem::initWithURL(url);
+    ASSERT_TRUE(item);
+    EXPECT_EQ(item->localizedName(), "a.txt");
+    EXPECT_THAT(item->typeIdentifier(), IsEmpty());
+    EXPECT_EQ(item->fileSize(), 5U);
+    EXPECT_EQ(item->parentDirectoryURL(), at("Notes"));
+    EXPECT_FALSE(item->hasHiddenExtension());
+    EXPECT_TRUE(item->contentModificationDate());
+
+    const auto folder = DRItem::initWithURL(at("Notes"));
+    ASSERT_TRUE(folder);
+    EXPECT_EQ(folder->typeIdentifier(), "public.directory");
+    EXPECT_TRUE(folder->isDirectory());
+}
+
+TEST_F(RecordFaultTest, FollowsALinkInTheFallback)
+{
+    makeFolder("Notes");
+    makeUnreachable();
+    const std::pair<std::string, std::string> rows[] = {
+        {"bare name", at("Notes/bare name").path()},
+        {"sub/name", at("Notes/sub/name").path()},
+        {"/elsewhere/file", "/elsewhere/file"},
+    };
+    for (const auto& [destination, resolved] : rows) {
+        const auto link = at("Notes/link");
+        std::filesystem::remove(link.path());
+        std::filesystem::create_symlink(destination, link.path());
+        const auto item = DRItem::initWithURL(link);
+        ASSERT_TRUE(item) << destination;
+        EXPECT_TRUE(item->isSymlink());
+        EXPECT_EQ(item->typeIdentifier(), "public.symlink");
+        EXPECT_EQ(item->symlinkTarget(), destination);
+        EXPECT_EQ(item->resolvedURL()->path(), resolved);
+    }
+}
+
+TEST_F(RecordFaultTest, RefusesWhatIsNeitherFileNorFolderInTheFallback)
+{
+    const auto url = at("pipe");
+    ASSERT_EQ(::mkfifo(url.path().c_str(), 0600), 0);
+    makeUnreachable();
+    EXPECT_FALSE(DRItem::initWithURL(url));
+}
+
+TEST_F(RecordFaultTest, ReadsPlainAttributesWhereTheRecordIsDamaged)
+{
+    const auto url = writeDocument("a.txt", "12345");
+    decorated->decoratedItems.changePromised = [](const Url&, Result<AttributeMap>& values) {
+        values = Error(platform::errorDomain::cloud, 1);
+    };
+    const auto item = DRItem::initWithURL(url);
+    ASSERT_TRUE(item);
+    EXPECT_EQ(item->fileSize(), 5U);
+    EXPECT_FALSE(item->typeIdentifier().empty());
+    EXPECT_EQ(log->count("WARNING promisedItemResourceValuesForKeys failed on " + url.absoluteString()), 1U);
+
+    decorated->decoratedItems.changePlain = decorated->decoratedItems.changePromised;
+    const auto fallback = DRItem::initWithURL(url);
+    ASSERT_TRUE(fallback);
+    EXPECT_THAT(fallback->typeIdentifier(), IsEmpty());
+}
+
+TEST_F(RecordFaultTest, DoesNotTryPlainAttributesOfAMissingItem)
+{
+    const auto url = writeDocument("a.txt", "12345");
+    decorated->decoratedItems.changePromised = [](const Url&, Result<AttributeMap>& values) {
+        values = Error(FileErrorCode::NoSuchItem);
+    };
+    const auto item = DRItem::initWithURL(url);
+    ASSERT_TRUE(item);
+    EXPECT_THAT(item->typeIdentifier(), IsEmpty());
+    EXPECT_THAT(log->lines(), testing::Not(testing::Contains(testing::HasSubstr("ResourceValues"))));
+}
+
+TEST_F(RecordFaultTest, HasNoRecordOfADamagedPromise)
+{
+    const auto url = at("lost.txt");
+    items_tests::writeFile(host::drive::PromiseRecord::pathFor(url.path()), "{ no promise");
+    EXPECT_FALSE(DRItem::initWithURL(url));
+    EXPECT_EQ(log->count("WARNING promisedItemResourceValuesForKeys failed on " + url.absoluteString()), 1U);
+}
+
+TEST_F(RecordFaultTest, StaysClearedWhenAReadingIsRefused)
+{
+    const auto url = writeDocument("a.txt", "12345");
+    coordinator->refusal = Error(platform::errorDomain::system, 11);
+    const auto item = DRItem::initWithURL(url);
+    ASSERT_TRUE(item);
+    EXPECT_THAT(item->localizedName(), IsEmpty());
+    EXPECT_EQ(item->fileSize(), std::nullopt);
+    EXPECT_TRUE(item->hasHiddenExtension());
+    EXPECT_EQ(item->resolvedURL(), url);
+    EXPECT_FALSE(item->isPromise());
+    EXPECT_FALSE(item->thumbnail());
+    EXPECT_TRUE(item->thumbnailFetched());
+}
+
+TEST_F(RecordFaultTest, ReadsWhereTheCoordinatorSendsIt)
+{
+    const auto url = writeDocument("a.txt", "12345"), moved = writeDocument("moved.txt", "1");
+    coordinator->elsewhere = moved;
+    const auto item = DRItem::initWithURL(url);
+    EXPECT_EQ(item->localizedName(), "moved.txt");
+    EXPECT_EQ(item->fileSize(), 1U);
+    EXPECT_EQ(item->resolvedURL(), url);
+    EXPECT_FALSE(item->isPromise());
+}
+
+TEST_F(RecordFaultTest, EndsTheAccessesThatItBegan)
+{
+    const auto url = writeDocument("a.txt", "12345");
+    for (const bool isNeeded : {true, false}) {
+        decorated->access.isNeeded = isNeeded;
+        decorated->access.started = decorated->access.stopped = 0;
+        DRItem::initWithURL(url)->thumbnail();
+        EXPECT_EQ(decorated->access.started, 2);
+        EXPECT_EQ(decorated->access.stopped, isNeeded ? 2 : 0);
+    }
+    coordinator->refusal = Error(platform::errorDomain::system, 11);
+    decorated->access = {};
+    DRItem::initWithURL(url);
+    EXPECT_EQ(decorated->access.stopped, 1);
+}
+
+class ThumbnailTest : public ItemsFixture {
+protected:
+    /// Gives every item these thumbnails, and counts the requests for them.
+    void provide(ThumbnailMap map)
+    {
+        decorated->decoratedItems.changePromised = [this, map = std::move(map)](
+                                                       const Url&, Result<AttributeMap>& values) {
+            values.value.emplace();
+            values.value->set(AttributeKey::ThumbnailMap, map);
+            ++fetches;
+        };
+    }
+    int fetches = 0;
+};
+
+TEST_F(ThumbnailTest, IsFetchedOnceWhetherThereIsOneOrNot)
+{
+    const auto large = Image::fromPixels(2, 1, 1, {0, 0});
+    const auto first = DRItem::initWithURL(writeDocument("a.png", "1"));
+    const auto second = DRItem::initWithURL(writeDocument("b.png", "1"));
+
+    provide({{256, Image::named("small")}, {1024, large}});
+    EXPECT_EQ(first->thumbnail(), large);
+    EXPECT_EQ(first->thumbnail(), large);
+    EXPECT_EQ(log->count("DEBUG URL Thumbs: (256: 0x0, 1024: 2x1)"), 1U);
+    provide({{256, Image::named("small")}});
+    EXPECT_FALSE(second->thumbnail());
+    EXPECT_FALSE(second->thumbnail());
+    EXPECT_EQ(fetches, 2);
 }
 
 } // namespace

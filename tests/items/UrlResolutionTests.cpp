@@ -6,10 +6,6 @@
 #include "items/UrlResolution.h"
 #include "tests/items/support/ItemsFixture.h"
 
-#include <gmock/gmock.h>
-
-#include <filesystem>
-
 using namespace tarrow;
 using items_tests::ItemsFixture;
 
@@ -25,14 +21,6 @@ TEST_F(UrlResolutionTest, LeavesAPlainLocationAsItIs)
         EXPECT_TRUE(trw_URLByResolvingPromise(url).isSameObject(url));
         EXPECT_TRUE(trw_URLByResolvingAlias(url).isSameObject(url));
     }
-}
-
-TEST_F(UrlResolutionTest, TurnsAPromisesPlaceIntoTheItemsPlace)
-{
-    const auto item = writePromise("Notes/a.txt", {});
-    const auto physical = Url::fileURL(host::drive::PromiseRecord::pathFor(item.path()));
-    EXPECT_EQ(trw_URLByResolvingPromise(physical), item);
-    EXPECT_EQ(trw_URLByResolvingPromise(item), item);
 }
 
 TEST_F(UrlResolutionTest, FollowsAReferenceToThePlaceWhereItsDocumentShows)
@@ -82,16 +70,6 @@ protected:
         return std::to_string(DriveFixture::cloud->documentIdentifiers().identify(url).value.value_or(0));
     }
 };
-
-TEST_F(DocumentIdentifierTest, AnswersNothingForWhatIsNoIdentifier)
-{
-    EXPECT_EQ(trw_URLFromDocumentID(std::nullopt), std::nullopt);
-    EXPECT_EQ(log->count("ERROR trw_URLFromDocumentID: missing document ID"), 1U);
-    log->clear();
-    for (const std::string text : {"", "  ", "x7", "-7", "+7"})
-        EXPECT_EQ(trw_URLFromDocumentID(text), std::nullopt) << text;
-    EXPECT_THAT(log->lines(), testing::IsEmpty());
-}
 
 TEST_F(DocumentIdentifierTest, FollowsADocumentThatMoves)
 {
@@ -157,13 +135,18 @@ TEST_F(DocumentIdentifierTest, SaysWhichStepFailed)
     }
 }
 
-TEST_F(DocumentIdentifierTest, NeverCutsANumberToSize)
+TEST_F(DocumentIdentifierTest, FindsNothingByWhatIsNoIdentifierAndCutsNoNumberToSize)
 {
     const auto identifier = std::stoull(identify(writeDocument("a.txt", "1")));
-    const auto longer = std::to_string((std::uint64_t{1} << 32) + identifier);
-    const auto other = std::to_string(identifier ^ 1);
-    for (const std::string& text :
-        {longer, "18446744073709551616" + std::to_string(identifier), other, std::string("0")})
+    EXPECT_EQ(trw_URLFromDocumentID(std::nullopt), std::nullopt);
+    EXPECT_EQ(log->count("ERROR trw_URLFromDocumentID: missing document ID"), 1U);
+    log->clear();
+    for (const std::string text : {"", "  ", "x7", "-7", "+7"})
+        EXPECT_EQ(trw_URLFromDocumentID(text), std::nullopt) << text;
+    EXPECT_THAT(log->lines(), testing::IsEmpty());
+    for (const std::string& text : {std::to_string((std::uint64_t{1} << 32) + identifier),
+             "18446744073709551616" + std::to_string(identifier), std::to_string(identifier ^ 1),
+             std::string("0")})
         EXPECT_EQ(trw_URLFromDocumentID(text), std::nullopt) << text;
     EXPECT_EQ(log->count("ERROR VXLibraryResolveDocumentId2 failed, errno:2(No such file or directory)"), 4U);
 }
