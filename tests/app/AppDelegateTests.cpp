@@ -13,20 +13,12 @@
 #include "screens/list/DocumentListController.h"
 #include "tests/browser/support/BrowserFixture.h"
 
-#include <gmock/gmock.h>
-
 namespace tarrow {
 namespace {
 
 using namespace testing_support;
-using platform::LaunchOptions;
-using platform::PropertyDictionary;
-using platform::PropertyValue;
-using platform::ShortcutItem;
-using platform::Url;
-using platform::UserActivity;
-using testing::ElementsAre;
-using testing::HasSubstr;
+using namespace platform;
+using namespace testing;
 
 constexpr auto top = "BrindleDefault";
 

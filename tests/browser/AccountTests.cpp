@@ -8,18 +8,13 @@
 #include "screens/list/DocumentListController.h"
 #include "tests/browser/support/BrowserFixture.h"
 
-#include <gmock/gmock.h>
-
 namespace tarrow {
 namespace {
 
 using namespace testing_support;
-using platform::Notification;
-using platform::PropertyValue;
-using screens::DocumentListController;
-using screens::UnavailableScreen;
-using testing::Each;
-using testing::ElementsAre;
+using namespace platform;
+using namespace screens;
+using namespace testing;
 
 constexpr auto tokenKey = "TarrowDriveAppID.UbiquityIdentityToken";
 
@@ -56,7 +51,10 @@ TEST_F(AccountTest, SignedOutAtLaunchAndSignedInLater)
     EXPECT_EQ(browser->quotaFetcher(), nullptr);
     EXPECT_EQ(browser->quotaBytes(), 0);
     EXPECT_EQ(log->count("WARNING Tarrow is not enabled"), 1);
-
+    offers->offer = SimulatedOffers::make(1, true);
+    post(Notification::StorageOfferDidChange);
+    dispatch->advance(30);
+    EXPECT_EQ(cloud->requests, 0) << "nobody is there to fetch the quota for";
     cloud->token = PropertyValue("account-1");
     post(Notification::CloudIdentityDidChange);
     EXPECT_TRUE(showsRootOnly());

@@ -14,10 +14,6 @@
 #include "screens/move/MoveTargetPicker.h"
 #include "tests/browser/support/BrowserFixture.h"
 
-#include <gmock/gmock.h>
-
-#include <filesystem>
-
 namespace tarrow {
 namespace {
 

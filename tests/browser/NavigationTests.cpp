@@ -17,18 +17,13 @@
 #include "screens/list/DocumentListController.h"
 #include "tests/browser/support/BrowserFixture.h"
 
-#include <gmock/gmock.h>
-
-#include <filesystem>
-
 namespace tarrow {
 namespace {
 
 using namespace testing_support;
 using kit::SearchPresentation;
 using platform::Url;
-using screens::DocumentListAction;
-using screens::DocumentListController;
+using namespace screens;
 using testing::ElementsAre;
 
 constexpr auto top = "BrindleDefault";
@@ -230,21 +225,6 @@ TEST_F(NavigationTest, AFolderThatWasSearchedForIsShownInItsRealPlace)
     EXPECT_THAT(stack(), ElementsAre(top, "Folder", "Sub", elsewhere.lastPathComponent()));
 }
 
-TEST_F(NavigationTest, AnUnchangedCountIsLoggedOnce)
-{
-    write("Folder/a.txt");
-    write("Folder/b.txt");
-    launch();
-    browser->warpToNewURLPreviewMode(url("Folder"), PreviewModeQuick);
-    settle();
-    const auto line = "DEBUG DLC items changed, count is 2";
-    const auto logged = log->count(line);
-    browser->documentListControllerItemsChanged(topList());
-    browser->documentListControllerItemsChanged(topList());
-    EXPECT_EQ(log->count(line), logged);
-    EXPECT_EQ(logged, 1);
-}
-
 TEST_F(NavigationTest, ARemovedFolderIsLeft)
 {
     write("Folder/a.txt");
@@ -267,7 +247,9 @@ TEST_F(NavigationTest, APeekShowsFoldersAndDocuments)
     const auto folder = std::dynamic_pointer_cast<PeekFolderViewController>(peek("Folder"));
     ASSERT_NE(folder, nullptr);
     EXPECT_EQ(folder->presentedURL(), url("Folder"));
-    EXPECT_FALSE(folder->shouldShowSearch());
+    folder->view();
+    EXPECT_FALSE(folder->navigationItem().searchAction());
+    EXPECT_TRUE(topList()->navigationItem().searchAction());
 
     EXPECT_EQ(peek("Folder/note.txt"), LookwellItemController::defaultController());
     EXPECT_EQ(browser->itemManager()->item()->url(), url("Folder/note.txt"));
@@ -375,7 +357,9 @@ TEST_F(NavigationTest, ADocumentOpensInTheAppThatOwnsItAndElseInThePreview)
     tap(note);
     EXPECT_THAT(apps->opened, ElementsAre(opened));
     tap(url("link"));
-    EXPECT_THAT(apps->opened, ElementsAre(opened, opened)) << "a link opens what it leads to";
+    tap(drive.writeReference("pointer.trwref", "BrindleDefault", "note.txt"));
+    EXPECT_THAT(apps->opened, ElementsAre(opened, opened, opened))
+        << "links and references open what they lead to";
     EXPECT_THAT(stack(), ElementsAre(top));
 
     const auto peekAndPop = [this](const Url& item) {
@@ -386,7 +370,7 @@ TEST_F(NavigationTest, ADocumentOpensInTheAppThatOwnsItAndElseInThePreview)
     openSearch();
     peekAndPop(note);
     EXPECT_EQ(search(), nullptr);
-    EXPECT_THAT(apps->opened, ElementsAre(opened, opened, opened));
+    EXPECT_THAT(apps->opened, testing::SizeIs(4));
     EXPECT_THAT(stack(), ElementsAre(top));
 
     apps->appsStart = false;
@@ -395,7 +379,7 @@ TEST_F(NavigationTest, ADocumentOpensInTheAppThatOwnsItAndElseInThePreview)
     browser->popToRootViewController(false);
     tap(note);
     EXPECT_THAT(stack(), ElementsAre(top, "*"));
-    EXPECT_EQ(log->count("DEBUG openInDefaultApp returned YES, app launched"), 3);
+    EXPECT_EQ(log->count("DEBUG openInDefaultApp returned YES, app launched"), 4);
     EXPECT_EQ(log->count("DEBUG openInDefaultApp returned NO, showing preview"), 1);
     EXPECT_EQ(log->count("DEBUG openInDefaultApp returned NO, showing cached Lookwell from Knop"), 1);
 

@@ -4,8 +4,6 @@
 #include "browser/NavController.h"
 #include "items/FileUtils.h"
 #include "kit/controllers/AlertController.h"
-#include "kit/controllers/NavigationItem.h"
-#include "kit/controllers/SearchPresentation.h"
 #include "kit/views/Button.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewItemManager.h"
@@ -15,10 +13,6 @@
 #include "screens/move/MoveTargetPicker.h"
 #include "screens/preview/PreviewScreenView.h"
 #include "tests/browser/support/BrowserFixture.h"
-
-#include <gmock/gmock.h>
-
-#include <filesystem>
 
 namespace tarrow {
 namespace {
@@ -201,35 +195,6 @@ TEST_F(WarpTest, WhatIsDoneFromAPeekLeavesTheListWhereItIs)
     EXPECT_FALSE(FileUtils::remove(url("renamed.txt")));
     settle();
     EXPECT_THAT(stack(), ElementsAre(top));
-}
-
-TEST_F(WarpTest, ASearchResultIsPreviewedWhereTheSearchWas)
-{
-    const auto note = write("note.txt");
-    launch();
-    topList()->startSearchWithQueryStringBecomeFirstResponder("note", true);
-    settle();
-    ASSERT_NE(
-        std::dynamic_pointer_cast<kit::SearchPresentation>(browser->presentedViewController()), nullptr);
-    open(note);
-    EXPECT_EQ(browser->presentedViewController(), nullptr);
-    EXPECT_THAT(stack(), ElementsAre(top, "*"));
-    EXPECT_EQ(shownItem(), note);
-}
-
-TEST_F(WarpTest, ChoosingItemsEnds)
-{
-    write("Folder/note.txt");
-    launch();
-    EXPECT_TRUE(topList()->navigationItem().rightItems().front()->press());
-    ASSERT_TRUE(browser->editMode());
-    EXPECT_TRUE(warp("Folder/note.txt"));
-    settle();
-    EXPECT_THAT(stack(), ElementsAre(top, "Folder", "*"));
-    browser->popViewController(false);
-    settle();
-    EXPECT_FALSE(topList()->editing());
-    EXPECT_FALSE(browser->editMode());
 }
 
 } // namespace
