@@ -19,12 +19,8 @@
 namespace tarrow {
 namespace {
 
-using kit::AlertActionStyle;
-using kit::TextField;
-using kit::TextRange;
-using kit::ViewController;
-using testing::ElementsAre;
-using testing::IsEmpty;
+using namespace kit;
+using namespace testing;
 
 class FilenamePromptTest : public testing::Test {
 protected:
@@ -220,15 +216,6 @@ TEST_F(FilenamePromptTest, ThePromptMayBeDroppedWhileItAsks)
         EXPECT_TRUE(byReturn ? field().userPressedReturn() : pressDone());
         EXPECT_FALSE(isOpen());
     }
-}
-
-TEST_F(FilenamePromptTest, EveryTextMayBeLeftOut)
-{
-    show(FilenamePrompt::newWithTitleMessagePlaceholderFilenameDoneButtonTextCompletion(
-        {}, {}, {}, {}, "", callback()));
-    EXPECT_EQ(alert->title() + alert->message() + field().placeholder() + field().text(), "");
-    EXPECT_EQ(prompt->defaultAction()->title(), "Done");
-    EXPECT_FALSE(prompt->defaultAction()->isEnabled());
 }
 
 TEST_F(FilenamePromptTest, TheMessageIsAsTallAsItsText)
