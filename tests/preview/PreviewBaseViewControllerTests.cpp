@@ -4,15 +4,12 @@
 #include "preview/PreviewBaseViewController.h"
 
 #include "PreviewFixture.h"
-#include "kit/controllers/AlertController.h"
 #include "kit/controllers/NavigationItem.h"
 #include "kit/values/Screen.h"
 #include "kit/views/Button.h"
 #include "kit/views/ScrollView.h"
 #include "screens/DocumentInteractionSheet.h"
 #include "screens/PlaceholderView.h"
-
-#include <gmock/gmock.h>
 
 using namespace platform;
 using namespace tarrow;
@@ -178,7 +175,7 @@ TEST_F(Base, SharesTheDocumentThatTheItemStandsFor)
     const auto sheet = manager->documentInteractionController();
     ASSERT_TRUE(sheet);
     EXPECT_EQ(sheet->url(), drive.url("Notes.txt"));
-    EXPECT_TRUE(std::dynamic_pointer_cast<kit::AlertController>(navigation->presentedViewController()));
+    EXPECT_TRUE(alert());
     navigation->dismissViewController(false);
 
     const auto nowhere = document("Other.txt");
@@ -193,9 +190,8 @@ TEST_F(Base, TheDeleteQuestionPointsAtItsButton)
 {
     const auto screen = show(document("Notes.txt"));
     EXPECT_TRUE(screen->barButtonDeleteItem()->press());
-    const auto alert = std::dynamic_pointer_cast<kit::AlertController>(navigation->presentedViewController());
-    ASSERT_TRUE(alert);
-    const auto* anchor = std::get_if<std::weak_ptr<kit::BarButtonItem>>(&alert->popoverAnchor());
+    ASSERT_TRUE(alert());
+    const auto* anchor = std::get_if<std::weak_ptr<kit::BarButtonItem>>(&alert()->popoverAnchor());
     ASSERT_TRUE(anchor);
     EXPECT_EQ(anchor->lock(), screen->barButtonDeleteItem());
 }

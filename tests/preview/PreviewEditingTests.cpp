@@ -2,7 +2,6 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "PreviewFixture.h"
-#include "kit/controllers/AlertController.h"
 #include "kit/views/Button.h"
 #include "kit/views/TextField.h"
 #include "platform/FileChanges.h"
@@ -17,12 +16,7 @@
 #include "tests/support/FormPdf.h"
 #include "tests/support/SimplePdf.h"
 
-#include <gmock/gmock.h>
-
 #include <sys/stat.h>
-
-#include <filesystem>
-#include <fstream>
 
 namespace {
 
@@ -30,13 +24,9 @@ namespace fs = std::filesystem;
 
 using namespace platform;
 using namespace screens;
-using kit::AlertController;
 using tarrow::DRItem;
-using testing::HasSubstr;
-using testing::IsEmpty;
-using testing::Not;
-using testing::SizeIs;
-using testing_support::formPdf;
+using namespace testing;
+using namespace testing_support;
 
 class PreviewEditingTest : public testing_support::PreviewFixture {
 protected:
@@ -72,10 +62,6 @@ protected:
         navigation->popViewController(false);
         drive.dispatch->runUntilIdle();
     }
-    std::shared_ptr<AlertController> alert() const
-    {
-        return std::dynamic_pointer_cast<AlertController>(navigation->presentedViewController());
-    }
     void answer(const std::string& title)
     {
         const auto asked = alert();
@@ -91,11 +77,6 @@ protected:
         const auto screen = std::dynamic_pointer_cast<NoteScreen>(alert()->contentViewController());
         ASSERT_TRUE(screen);
         screen->note()->userEdited(text);
-    }
-    static std::string contentOf(const Url& url)
-    {
-        std::ifstream file(url.path(), std::ios::binary);
-        return {std::istreambuf_iterator<char>(file), {}};
     }
     /// Answers the content of the first field of a document on the disk.
     static std::string written(const Url& url)

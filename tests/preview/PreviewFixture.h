@@ -4,16 +4,13 @@
 #pragma once
 
 #include "items/DRItem.h"
+#include "kit/controllers/AlertController.h"
 #include "kit/controllers/NavigationController.h"
 #include "kit/controllers/Window.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewDetailsViewController.h"
 #include "preview/PreviewItemManager.h"
 #include "tests/screens/support/ComponentsFixture.h"
-
-#include <memory>
-#include <string>
-#include <vector>
 
 namespace testing_support {
 
@@ -34,6 +31,10 @@ protected:
     std::shared_ptr<tarrow::DRItem> document(const char* name)
     {
         return tarrow::DRItem::initWithURL(drive.writeDocument(name, "content of " + std::string(name)));
+    }
+    std::shared_ptr<kit::AlertController> alert() const
+    {
+        return std::dynamic_pointer_cast<kit::AlertController>(navigation->presentedViewController());
     }
     /// Answers the last names of the shown folders, "*" for the quick preview, "i" for a details screen and
     /// "-" for another screen.

@@ -6,10 +6,7 @@
 #include "PreviewFixture.h"
 #include "items/DRItem.h"
 #include "kit/controllers/SearchPresentation.h"
-#include "preview/LookwellItemController.h"
 #include "screens/preview/PreviewContent.h"
-
-#include <gmock/gmock.h>
 
 using namespace platform;
 using namespace tarrow;
@@ -52,18 +49,6 @@ TEST_F(Manager, OnlyKeepsAnItemThatIsNotToBeShown)
     EXPECT_EQ(drive.log->count("WARNING no preview URL, nothing to show"), 1U);
 }
 
-TEST_F(Manager, IsRegisteredForTheItemThatIsShownWhileTheApplicationIsActive)
-{
-    manager->prepareToPreviewItem(document("First.txt"));
-    EXPECT_TRUE(manager->filePresenterRegistered());
-    drive.notifications->post(Notification::ApplicationWillResignActive);
-    EXPECT_FALSE(manager->filePresenterRegistered());
-    drive.notifications->post(Notification::ApplicationDidBecomeActive);
-    EXPECT_TRUE(manager->filePresenterRegistered());
-    EXPECT_EQ(drive.log->count("DEBUG Becoming active for " + logText(drive.url("First.txt"))), 1U);
-    EXPECT_EQ(drive.log->count("DEBUG Preview: Using LookwellItemController, File Exists"), 1U);
-}
-
 TEST_F(Manager, DismissesASearchBeforeItShowsThePreview)
 {
     base->presentViewController(std::make_shared<kit::SearchPresentation>(), false);
@@ -74,32 +59,6 @@ TEST_F(Manager, DismissesASearchBeforeItShowsThePreview)
     base->presentViewController(std::make_shared<kit::ViewController>(), false);
     manager->previewItem(document("Second.txt"));
     EXPECT_TRUE(navigation->presentedViewController());
-}
-
-TEST_F(Manager, LeadsTheStackToAnotherPlace)
-{
-    const auto top = drive.layout().defaultContainer();
-    const auto topName = Url::fileURL(top).lastPathComponent();
-    drive.writeDocument("Documents/Trip/Map.txt");
-    EXPECT_TRUE(manager->warpToNewURL(drive.url("Documents/Trip/Map.txt")));
-    EXPECT_EQ(stack(), (Names{topName, "Documents", "Trip", "*"}));
-    EXPECT_EQ(manager->item()->url(), drive.url("Documents/Trip/Map.txt"));
-    EXPECT_TRUE(manager->filePresenterRegistered());
-
-    base->presentViewController(std::make_shared<kit::ViewController>(), false);
-    EXPECT_TRUE(manager->warpToNewURL(drive.url("Documents")));
-    EXPECT_EQ(stack(), (Names{topName, "Documents"}));
-    EXPECT_FALSE(manager->filePresenterRegistered());
-
-    for (const auto& nowhere : {drive.url("Documents/Gone/File.txt"), Url::fileURL("/usr")}) {
-        EXPECT_FALSE(manager->warpToNewURL(nowhere));
-        EXPECT_EQ(stack(), (Names{topName, "Documents"}));
-    }
-    EXPECT_EQ(
-        drive.log->count("ERROR : Couldn't build DLC stack for " + logText(Url::fileURL("/usr")) + "."), 1U);
-    EXPECT_EQ(drive.log->count("ERROR Can't build DLC stack, can't get directory: "
-                  + logText(drive.url("Documents/Gone/File.txt"))),
-        1U);
 }
 
 TEST_F(Manager, HasNothingToShowWithoutAnItem)

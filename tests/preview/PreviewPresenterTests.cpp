@@ -3,25 +3,19 @@
 
 #include "PreviewFixture.h"
 #include "items/FileUtils.h"
-#include "kit/controllers/AlertController.h"
 #include "platform/ActivityHandOver.h"
 #include "screens/PlaceholderView.h"
 #include "screens/preview/PreviewContent.h"
 
 #include <fcntl.h>
-#include <gmock/gmock.h>
 #include <sys/stat.h>
 
-#include <filesystem>
-#include <fstream>
 #include <thread>
 
 using namespace platform;
 using namespace tarrow;
-using kit::AlertController;
 using screens::MoveTargetPicker;
-using testing::ElementsAre;
-using testing::HasSubstr;
+using namespace testing;
 
 namespace {
 
@@ -56,10 +50,6 @@ protected:
         for (const auto& line : drive.log->lines())
             count += line.starts_with("INFO Refreshing ") ? 1 : 0;
         return count;
-    }
-    std::shared_ptr<AlertController> alert() const
-    {
-        return std::dynamic_pointer_cast<AlertController>(navigation->presentedViewController());
     }
     std::string top() const { return Url::fileURL(drive.layout().defaultContainer()).lastPathComponent(); }
     static constexpr auto reloaded = "DEBUG LWPreviewController: refreshCurrentPreviewItem";
