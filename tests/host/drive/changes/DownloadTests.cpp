@@ -7,26 +7,17 @@
 #include "host/drive/records/SmallFile.h"
 #include "tests/support/DriveFixture.h"
 
-#include <gmock/gmock.h>
-
 #include <cerrno>
-#include <filesystem>
-#include <fstream>
 
 namespace {
 
 namespace fs = std::filesystem;
 
-using host::drive::CloudErrorCode;
-using host::drive::CloudStore;
-using host::drive::LocalCloudStore;
-using host::drive::PromiseRecord;
+using namespace host::drive;
 using host::system::FileDescriptor;
 using host::system::SystemError;
-using platform::DownloadProgress;
-using platform::Error;
-using platform::FileErrorCode;
-using platform::Url;
+using namespace platform;
+using testing_support::contentOf;
 
 /// The local store, whose fetch can fail.
 class FaultyStore : public LocalCloudStore {
@@ -64,20 +55,7 @@ protected:
     bool isIntact(const std::string& name, const std::string& text) const
     {
         return !fs::exists(url(name).path()) && fs::exists(PromiseRecord::pathFor(url(name).path()))
-            && read(content("content-" + name)) == text && !hasTraces();
-    }
-    static std::string read(const std::string& path)
-    {
-        std::ifstream file(path);
-        return {std::istreambuf_iterator<char>(file), {}};
-    }
-    bool hasTraces() const
-    {
-        return std::any_of(fs::recursive_directory_iterator(layout().home()),
-            fs::recursive_directory_iterator(), [](const auto& entry) {
-                const auto name = entry.path().filename().string();
-                return name.starts_with(".trw") || name.ends_with(".place");
-            });
+            && contentOf(content("content-" + name)) == text && !hasTraces();
     }
     std::unique_ptr<platform::ItemDownload> start(const Url& item)
     {
@@ -103,7 +81,7 @@ TEST_F(DownloadTest, PutsTheDocumentWithAllThatIsKnownOfItInThePromisesPlace)
     dispatch->runUntilIdle();
     ASSERT_EQ(ended.size(), 1U);
     EXPECT_FALSE(ended[0]) << ended[0]->debugDescription();
-    EXPECT_EQ(read(item.path()), text);
+    EXPECT_EQ(contentOf(item.path()), text);
     const auto facts = host::drive::lookAtFile(item.path());
     EXPECT_EQ(facts.modified(), platform::Date{1'600'000'000'123'456'789});
     EXPECT_THAT(facts.marks.tags, testing::ElementsAre("Red", "Blue"));
@@ -123,7 +101,7 @@ TEST_F(DownloadTest, PutsTheDocumentWithAllThatIsKnownOfItInThePromisesPlace)
     const auto back = start(item);
     dispatch->runUntilIdle();
     EXPECT_EQ(ended, (std::vector<std::optional<Error>>(3)));
-    EXPECT_EQ(read(item.path()), text);
+    EXPECT_EQ(contentOf(item.path()), text);
 }
 
 TEST_F(DownloadTest, IsOneForAllWhoAskForTheDocument)
@@ -144,7 +122,7 @@ TEST_F(DownloadTest, IsOneForAllWhoAskForTheDocument)
     dispatch->runUntilIdle();
     EXPECT_EQ(heard.size(), 1U);
     EXPECT_EQ(ended, (std::vector<std::optional<Error>>(1)));
-    EXPECT_EQ(read(item.path()), text);
+    EXPECT_EQ(contentOf(item.path()), text);
     ASSERT_GE(told.size(), 3U);
     EXPECT_EQ(told.back(), std::nullopt);
     EXPECT_EQ(told[told.size() - 2], (DownloadProgress{text.size(), text.size()}));
@@ -211,7 +189,7 @@ TEST_F(DownloadTest, AFailureLeavesPromiseAndContentAsTheyWere)
         EXPECT_TRUE(isIntact(name, "a whole text")) << name;
         store.failAfterHalf = 0;
         EXPECT_FALSE(host::drive::bringHere(layout(), store, item.path(), goOn)) << "it can be tried again";
-        EXPECT_EQ(read(item.path()), "a whole text");
+        EXPECT_EQ(contentOf(item.path()), "a whole text");
     }
     const auto emptied = promise("emptied", "a whole text");
     std::ofstream(content("content-emptied"), std::ios::trunc).flush();
@@ -229,8 +207,8 @@ TEST_F(DownloadTest, WhatHappensMeanwhileCounts)
     auto error = host::drive::bringHere(layout(), store, item.path(), goOn);
     ASSERT_TRUE(error);
     EXPECT_TRUE(error->is(FileErrorCode::ItemExists));
-    EXPECT_EQ(read(item.path()), "saved meanwhile");
-    EXPECT_EQ(read(content("content-a.txt")), "cloud");
+    EXPECT_EQ(contentOf(item.path()), "saved meanwhile");
+    EXPECT_EQ(contentOf(content("content-a.txt")), "cloud");
 
     const auto deleted = promise("deleted", "cloud"), moved = promise("moved", "cloud");
     store.beforeFetch = [&] { fs::remove(PromiseRecord::pathFor(deleted.path())); };
@@ -245,7 +223,7 @@ TEST_F(DownloadTest, WhatHappensMeanwhileCounts)
     EXPECT_FALSE(fs::exists(moved.path()));
     store.beforeFetch = [] {};
     EXPECT_FALSE(host::drive::bringHere(layout(), store, url("there").path(), goOn));
-    EXPECT_EQ(read(url("there").path()), "cloud");
+    EXPECT_EQ(contentOf(url("there").path()), "cloud");
     EXPECT_FALSE(hasTraces());
 }
 
@@ -295,7 +273,7 @@ TEST_F(DownloadTest, TheStoreKeepsItsContentsApart)
     EXPECT_TRUE(store.move("a", "b").is(EEXIST));
     EXPECT_TRUE(store.move("a", "../a").is(ENOENT));
     EXPECT_FALSE(store.move("a", "c"));
-    EXPECT_EQ(read(content("c")), "a");
+    EXPECT_EQ(contentOf(content("c")), "a");
     EXPECT_FALSE(store.remove("../account.json"));
     EXPECT_FALSE(store.remove("gone"));
     EXPECT_FALSE(store.remove("b"));

@@ -6,13 +6,9 @@
 #include "host/drive/changes/Recovery.h"
 #include "tests/support/DriveFixture.h"
 
-#include <gmock/gmock.h>
-
 #include <fcntl.h>
 
 #include <atomic>
-#include <filesystem>
-#include <fstream>
 #include <set>
 #include <thread>
 
@@ -20,11 +16,10 @@ namespace {
 
 namespace fs = std::filesystem;
 
-using host::drive::LocalCloudStore;
-using host::drive::LocalItemChanges;
-using host::drive::PromiseRecord;
+using namespace host::drive;
 using host::system::FileDescriptor;
 using platform::Url;
+using testing_support::contentOf;
 
 /// Is called between the check of a document and its removal or move, because the document has a promise
 /// beside it. At that moment it lets other programs work for as long as they like.
@@ -95,12 +90,6 @@ private:
 
 class RaceTest : public testing::Test, public testing_support::DriveFixture {
 protected:
-    static void write(const std::string& path, const std::string& text) { std::ofstream(path) << text; }
-    static std::string read(const std::string& path)
-    {
-        std::ifstream file(path);
-        return {std::istreambuf_iterator<char>(file), {}};
-    }
     void promiseBeside(const std::string& name) const
     {
         PromiseRecord promise;
@@ -114,7 +103,7 @@ protected:
         host::drive::Recovery(layout(), *store).run();
         for (const auto& entry : fs::recursive_directory_iterator(layout().home())) {
             if (entry.is_regular_file())
-                accounted.insert(std::atoi(read(entry.path().string()).c_str()));
+                accounted.insert(std::atoi(contentOf(entry.path().string()).c_str()));
         }
         for (int version = 1; version <= saver.saved; ++version)
             EXPECT_TRUE(accounted.contains(version)) << version << " of " << saver.saved << " is lost";
@@ -217,7 +206,7 @@ TEST_F(RaceTest, AFolderSwappedForALinkNeverLeadsOutside)
         const auto error =
             isMove ? changes.moveItem(from + "/a.txt", moved) : changes.removeItem(from + "/a.txt", {});
         done += error ? 0 : 1;
-        ASSERT_EQ(read(precious), "precious") << "round " << round;
+        ASSERT_EQ(contentOf(precious), "precious") << "round " << round;
         changes.moveItem(target.path(), from + "/into");
         changes.moveItem(from + "/into", target.path());
     }

@@ -5,21 +5,17 @@
 #include "host/drive/records/ItemFacts.h"
 #include "tests/support/DriveFixture.h"
 
-#include <gtest/gtest.h>
 #include <sqlite3.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
 #include <csignal>
-#include <filesystem>
-#include <fstream>
 #include <random>
 #include <set>
 
 namespace {
 
-using host::drive::DocumentIndex;
-using host::drive::LocalDocumentIdentifiers;
+using namespace host::drive;
 using platform::Url;
 using testing_support::DriveFixture;
 using Kind = DocumentIndex::Answer::Kind;

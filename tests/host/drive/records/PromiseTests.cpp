@@ -5,21 +5,13 @@
 #include "platform/FileCoordinator.h"
 #include "tests/support/DriveFixture.h"
 
-#include <gmock/gmock.h>
-
 #include <sys/stat.h>
-
-#include <filesystem>
 
 namespace {
 
 using host::drive::PromiseRecord;
-using platform::AttributeKey;
-using platform::DownloadingStatus;
-using platform::FileErrorCode;
-using platform::SharedItemRole;
-using testing::ElementsAre;
-using testing::StartsWith;
+using namespace platform;
+using namespace testing;
 using testing_support::DriveFixture;
 
 constexpr AttributeKey allKeys[] = {AttributeKey::Name, AttributeKey::LocalizedName,

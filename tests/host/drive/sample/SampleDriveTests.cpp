@@ -7,22 +7,18 @@
 #include "platform/TypeRegistry.h"
 #include "tests/support/DriveFixture.h"
 
-#include <gmock/gmock.h>
 #include <nlohmann/json.hpp>
 
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include <filesystem>
-#include <fstream>
 #include <map>
 #include <set>
 
 namespace {
 
 using host::drive::DriveLayout;
-using platform::AttributeKey;
-using platform::Url;
+using namespace platform;
 using testing::UnorderedElementsAreArray;
 using testing_support::DriveFixture;
 namespace fs = std::filesystem;
@@ -36,7 +32,7 @@ protected:
         _layout = std::make_unique<DriveLayout>(DriveLayout::at(_drive->folder().at("sample")));
         _first = host::drive::sample::makeSampleDrive(*_layout);
         _cloud = host::drive::LocalCloudDocumentService::create(*_layout,
-            {_drive->dispatch, _drive->notifications, types(), nullptr, nullptr},
+            {_drive->dispatch, _drive->notifications, _drive->installed.typeRegistry, nullptr, nullptr},
             {{"de"}, _drive->folder().at("t")});
     }
     static void TearDownTestSuite()
@@ -47,64 +43,46 @@ protected:
         _drive.reset();
     }
 
-    static std::shared_ptr<platform::TypeRegistry> types();
     /// Answers every item below the documents area by its logical path; a promise stands for its item.
-    static std::vector<Url> items();
-    static platform::AttributeMap values(const Url& url);
-    static std::map<std::string, std::string> contents();
+    static std::vector<Url> items()
+    {
+        std::vector<Url> found;
+        constexpr auto options = fs::directory_options::skip_permission_denied;
+        for (const auto& entry : fs::recursive_directory_iterator(_layout->documents(), options)) {
+            const auto url = Url::fileURL(entry.path().string());
+            found.push_back(_cloud->promisedItems().logicalURLForPromise(url));
+        }
+        return found;
+    }
+    static platform::AttributeMap values(const Url& url)
+    {
+        constexpr AttributeKey keys[] = {AttributeKey::TypeIdentifier, AttributeKey::DownloadingStatus,
+            AttributeKey::IsPackage, AttributeKey::IsShared, AttributeKey::SharedItemRole,
+            AttributeKey::FileSize};
+        const auto result = _cloud->promisedItems().promisedItemResourceValues(url, keys);
+        EXPECT_TRUE(result) << url.path();
+        return result.value.value_or(platform::AttributeMap());
+    }
+    static std::map<std::string, std::string> contents()
+    {
+        std::map<std::string, std::string> found;
+        constexpr auto options = fs::directory_options::skip_permission_denied;
+        for (const auto& entry : fs::recursive_directory_iterator(_layout->home(), options)) {
+            struct stat status { };
+            ::lstat(entry.path().c_str(), &status);
+            std::ifstream file(entry.path(), std::ios::binary);
+            found[entry.path().string()] = std::to_string(status.st_ino) + ' '
+                + std::to_string(status.st_mtim.tv_nsec) + ' '
+                + (entry.is_regular_file() ? std::string(std::istreambuf_iterator<char>(file), {}) : "");
+        }
+        return found;
+    }
 
-    static std::unique_ptr<DriveFixture> _drive;
-    static std::unique_ptr<DriveLayout> _layout;
-    static host::drive::sample::Outcome _first;
-    static std::shared_ptr<host::drive::LocalCloudDocumentService> _cloud;
+    static inline std::unique_ptr<DriveFixture> _drive;
+    static inline std::unique_ptr<DriveLayout> _layout;
+    static inline host::drive::sample::Outcome _first;
+    static inline std::shared_ptr<host::drive::LocalCloudDocumentService> _cloud;
 };
-
-std::unique_ptr<DriveFixture> SampleDriveTests::_drive;
-std::unique_ptr<DriveLayout> SampleDriveTests::_layout;
-host::drive::sample::Outcome SampleDriveTests::_first;
-std::shared_ptr<host::drive::LocalCloudDocumentService> SampleDriveTests::_cloud;
-
-std::shared_ptr<platform::TypeRegistry> SampleDriveTests::types()
-{
-    // The fixture keeps the registry alive as long as the suite runs.
-    return {std::shared_ptr<void>(), &platform::services().typeRegistry()};
-}
-
-std::vector<Url> SampleDriveTests::items()
-{
-    std::vector<Url> found;
-    constexpr auto options = fs::directory_options::skip_permission_denied;
-    for (const auto& entry : fs::recursive_directory_iterator(_layout->documents(), options)) {
-        const auto url = Url::fileURL(entry.path().string());
-        found.push_back(_cloud->promisedItems().logicalURLForPromise(url));
-    }
-    return found;
-}
-
-platform::AttributeMap SampleDriveTests::values(const Url& url)
-{
-    constexpr AttributeKey keys[] = {AttributeKey::TypeIdentifier, AttributeKey::DownloadingStatus,
-        AttributeKey::IsPackage, AttributeKey::IsShared, AttributeKey::SharedItemRole,
-        AttributeKey::FileSize};
-    const auto result = _cloud->promisedItems().promisedItemResourceValues(url, keys);
-    EXPECT_TRUE(result) << url.path();
-    return result.value.value_or(platform::AttributeMap());
-}
-
-std::map<std::string, std::string> SampleDriveTests::contents()
-{
-    std::map<std::string, std::string> found;
-    constexpr auto options = fs::directory_options::skip_permission_denied;
-    for (const auto& entry : fs::recursive_directory_iterator(_layout->home(), options)) {
-        struct stat status { };
-        ::lstat(entry.path().c_str(), &status);
-        std::ifstream file(entry.path(), std::ios::binary);
-        found[entry.path().string()] = std::to_string(status.st_ino) + ' '
-            + std::to_string(status.st_mtim.tv_nsec) + ' '
-            + (entry.is_regular_file() ? std::string(std::istreambuf_iterator<char>(file), {}) : "");
-    }
-    return found;
-}
 
 TEST_F(SampleDriveTests, holdsEveryKindOfItem)
 {

@@ -16,8 +16,7 @@
 
 namespace {
 
-using host::drive::AccountRecord;
-using host::drive::DriveLayout;
+using namespace host::drive;
 using testing::HasSubstr;
 
 struct Outcome {

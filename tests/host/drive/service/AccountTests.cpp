@@ -4,15 +4,10 @@
 #include "host/drive/records/AccountRecord.h"
 #include "tests/support/DriveFixture.h"
 
-#include <gtest/gtest.h>
-
-#include <filesystem>
-#include <fstream>
-
 namespace {
 
 using platform::Notification;
-using testing_support::DriveFixture;
+using namespace testing_support;
 
 class AccountTests : public testing::Test {
 protected:
@@ -25,11 +20,6 @@ protected:
     void writeAccount(std::string_view text) const
     {
         std::ofstream(_drive.layout().account(), std::ios::trunc) << text;
-    }
-    std::string accountText() const
-    {
-        std::ifstream file(_drive.layout().account());
-        return {std::istreambuf_iterator<char>(file), {}};
     }
     std::optional<platform::PropertyValue> token() { return _drive.cloud->account().identityToken(); }
 
@@ -102,7 +92,7 @@ TEST_F(AccountTests, aDamagedAccountIsNobodyAndIsLeftAsItIs)
         ASSERT_EQ(_drive.log->lines().size(), 1u) << text.substr(0, 40);
         const auto line = _drive.log->lines().front();
         EXPECT_TRUE(line.starts_with("ERROR Cannot use the account in " + _drive.layout().account())) << line;
-        EXPECT_EQ(accountText(), text);
+        EXPECT_EQ(contentOf(_drive.layout().account()), text);
     }
     _drive.settle();
     EXPECT_EQ(_notices, 1);

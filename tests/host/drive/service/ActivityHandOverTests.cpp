@@ -7,18 +7,9 @@
 #include "host/drive/service/LocalActivityHandOver.h"
 #include "tests/support/DriveFixture.h"
 
-#include <gtest/gtest.h>
-
-#include <filesystem>
-#include <fstream>
-
 namespace {
 
-using host::drive::ActivityPublication;
-using host::drive::ActivityRecord;
-using host::drive::Bookmark;
-using host::drive::DriveLayout;
-using host::drive::LocalActivityHandOver;
+using namespace host::drive;
 using platform::UserActivity;
 using testing_support::DriveFixture;
 using Activity = std::shared_ptr<const UserActivity>;

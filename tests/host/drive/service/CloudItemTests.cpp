@@ -6,11 +6,6 @@
 #include "host/drive/records/ItemFacts.h"
 #include "tests/support/DriveFixture.h"
 
-#include <gtest/gtest.h>
-
-#include <filesystem>
-#include <fstream>
-
 namespace {
 
 using host::drive::Bookmark;

@@ -3,17 +3,11 @@
 
 #include "tests/support/DriveFixture.h"
 
-#include <gmock/gmock.h>
-
-#include <filesystem>
-#include <fstream>
-
 namespace {
 
 using host::drive::ContainerRecord;
 using platform::Url;
-using testing::ElementsAre;
-using testing::IsEmpty;
+using namespace testing;
 using testing_support::DriveFixture;
 
 class ContainerTests : public testing::Test {

@@ -6,22 +6,14 @@
 #include "platform/TypeRegistry.h"
 #include "tests/support/DriveFixture.h"
 
-#include <gmock/gmock.h>
-
 #include <sys/stat.h>
 #include <unistd.h>
-
-#include <filesystem>
 
 namespace {
 
 namespace itemMark = host::drive::itemMark;
 using host::drive::PromiseRecord;
-using platform::AttributeKey;
-using platform::AttributeMap;
-using platform::DownloadingStatus;
-using platform::FileErrorCode;
-using platform::Url;
+using namespace platform;
 using testing_support::DriveFixture;
 
 class ItemTests : public testing::Test {

@@ -4,16 +4,9 @@
 #include "platform/KeyValueStore.h"
 #include "tests/support/DriveFixture.h"
 
-#include <gtest/gtest.h>
-
-#include <filesystem>
-#include <fstream>
-
 namespace {
 
-using platform::PropertyArray;
-using platform::PropertyDictionary;
-using platform::PropertyValue;
+using namespace platform;
 
 class KeyValueStoreTests : public testing::Test {
 protected:

@@ -6,15 +6,9 @@
 #include "platform/LinkOpener.h"
 #include "tests/support/DriveFixture.h"
 
-#include <gmock/gmock.h>
-
-#include <fstream>
-
 namespace {
 
-using host::drive::AccountRecord;
-using host::drive::LocalStorageOfferManager;
-using host::drive::StorageSpace;
+using namespace host::drive;
 using platform::StorageOffer;
 using testing::ElementsAre;
 using testing_support::DriveFixture;

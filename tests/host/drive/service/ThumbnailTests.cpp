@@ -5,18 +5,13 @@
 #include "host/drive/service/ThumbnailCache.h"
 #include "tests/support/DriveFixture.h"
 
-#include <gtest/gtest.h>
-
 #include <sys/stat.h>
 
-#include <filesystem>
 #include <thread>
 
 namespace {
 
-using platform::AttributeKey;
-using platform::ThumbnailMap;
-using platform::Url;
+using namespace platform;
 using testing_support::DriveFixture;
 
 class ThumbnailTests : public testing::Test {
