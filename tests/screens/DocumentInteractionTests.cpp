@@ -8,14 +8,10 @@
 #include "platform/Localization.h"
 #include "screens/DocumentInteractionSheet.h"
 
-#include <gmock/gmock.h>
-
 using namespace platform;
 using namespace screens;
-using testing::ElementsAre;
-using testing::IsEmpty;
-using testing_support::ComponentsFixture;
-using testing_support::SimulatedApps;
+using namespace testing;
+using namespace testing_support;
 
 namespace {
 

@@ -7,12 +7,9 @@
 #include "screens/UpgradeFlow.h"
 #include "tests/screens/support/ComponentsFixture.h"
 
-#include <gmock/gmock.h>
-
 using namespace platform;
 using namespace screens;
-using testing::ElementsAre;
-using testing::IsEmpty;
+using namespace testing;
 
 namespace {
 

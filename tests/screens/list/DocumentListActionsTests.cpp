@@ -15,10 +15,7 @@
 using namespace platform;
 using namespace screens;
 using testing::ElementsAre;
-using testing_support::DocumentList;
-using testing_support::HandLister;
-using testing_support::Lines;
-using testing_support::RecordingListObserver;
+using namespace testing_support;
 
 namespace {
 

@@ -11,17 +11,10 @@
 #include "platform/Localization.h"
 #include "screens/list/RowThumbnail.h"
 
-#include <filesystem>
-#include <fstream>
-
 using namespace platform;
 using namespace screens;
-using testing::ElementsAre;
-using testing::HasSubstr;
-using testing_support::DocumentList;
-using testing_support::HandLister;
-using testing_support::Lines;
-using testing_support::RecordingListObserver;
+using namespace testing;
+using namespace testing_support;
 namespace mark = host::drive::itemMark;
 
 namespace {

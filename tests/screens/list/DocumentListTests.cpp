@@ -10,15 +10,11 @@
 #include "screens/UnavailableScreen.h"
 
 #include <cerrno>
-#include <filesystem>
 
 using namespace platform;
 using namespace screens;
 using testing::HasSubstr;
-using testing_support::DocumentList;
-using testing_support::HandLister;
-using testing_support::Lines;
-using testing_support::RecordingListObserver;
+using namespace testing_support;
 
 namespace {
 

@@ -7,11 +7,7 @@
 #include "screens/list/FolderContents.h"
 #include "tests/screens/support/ComponentsFixture.h"
 
-#include <gtest/gtest.h>
-
 #include <algorithm>
-#include <filesystem>
-#include <fstream>
 #include <random>
 
 using namespace platform;

@@ -13,12 +13,9 @@
 #include "screens/move/MoveTargetPicker.h"
 #include "screens/move/MoveTargetScreen.h"
 
-#include <gmock/gmock.h>
-
 using namespace platform;
 using namespace screens;
-using testing::ElementsAre;
-using testing::IsEmpty;
+using namespace testing;
 using testing_support::ComponentsFixture;
 
 namespace {

@@ -6,14 +6,9 @@
 #include "tests/support/FormPdf.h"
 #include "tests/support/SimplePdf.h"
 
-#include <gmock/gmock.h>
-
 using namespace platform;
-using testing::ElementsAre;
-using testing::IsEmpty;
-using testing_support::ComponentsFixture;
-using testing_support::formPdf;
-using testing_support::simplePdf;
+using namespace testing;
+using namespace testing_support;
 
 namespace {
 

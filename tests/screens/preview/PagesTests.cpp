@@ -7,16 +7,12 @@
 #include "tests/screens/support/ComponentsFixture.h"
 #include "tests/support/SimplePdf.h"
 
-#include <gmock/gmock.h>
-
 #include <set>
 
 using namespace platform;
 using namespace screens;
-using testing::ElementsAre;
-using testing::HasSubstr;
-using testing_support::ComponentsFixture;
-using testing_support::simplePdf;
+using namespace testing;
+using namespace testing_support;
 
 namespace {
 
