@@ -32,19 +32,6 @@ TEST_F(LogTest, FillsPlaceholdersOfEveryKind)
             "INFO file:///a%20b p s -3 4 5 0.500000 100%", "WARNING (null)", "DEBUG (a, b)"}));
 }
 
-TEST_F(LogTest, HidesOnlyPrivateValues)
-{
-    const std::vector<LogValue> values{std::string("secret"), std::string("open"), std::int64_t{7}};
-    EXPECT_EQ(formatLogMessage("%@ %{public}@ %d", values, PrivateValues::Hidden), "<private> open 7");
-}
-
-TEST_F(LogTest, LaysOutTheWholeLine)
-{
-    const std::vector<LogValue> values{std::string("x")};
-    const LogLine line{LogLevel::Error, "-[DRItem initWithURL:]", 12, "Failed %@", values};
-    EXPECT_EQ(logLineText(line, PrivateValues::Shown), "(TRW)[ERROR] -[DRItem initWithURL:] (12) Failed x");
-}
-
 TEST_F(LogTest, DropsLevelsThatAreOffAndOpensActivities)
 {
     static constexpr Operation op{"-[Test drops]"};

@@ -5,9 +5,7 @@
 
 #include <gtest/gtest.h>
 
-using platform::PathKind;
-using platform::percentDecoded;
-using platform::Url;
+using namespace platform;
 
 namespace {
 
@@ -67,13 +65,6 @@ TEST(Url, ComparesPlacesNameByName)
     EXPECT_FALSE(Url::fileURL("/drive/Documents-evil/a").isWithin(root));
     EXPECT_FALSE(Url::fileURL("/drive").isWithin(root));
     EXPECT_TRUE(Url::fileURL("/a").isWithin(Url::fileURL("/")));
-}
-
-TEST(Url, DecodesOncePerCall)
-{
-    EXPECT_EQ(percentDecoded("a%2520b"), "a%20b");
-    EXPECT_EQ(percentDecoded("a%20b"), "a b");
-    EXPECT_FALSE(percentDecoded("100%"));
 }
 
 } // namespace

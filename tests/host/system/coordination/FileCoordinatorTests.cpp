@@ -21,13 +21,8 @@
 namespace {
 
 using host::system::LocalFileCoordinator;
-using platform::Error;
-using platform::ReadingOptions;
-using platform::Url;
-using platform::WritingOptions;
-using testing::ElementsAre;
-using testing::IsEmpty;
-using testing::UnorderedElementsAre;
+using namespace platform;
+using namespace testing;
 using testing_support::RecordingPresenter;
 
 class FileCoordinatorTest : public testing::Test {

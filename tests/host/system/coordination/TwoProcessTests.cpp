@@ -24,12 +24,8 @@
 namespace {
 
 using host::system::LocalFileCoordinator;
-using platform::ReadingOptions;
-using platform::Url;
-using platform::WritingOptions;
-using testing::ElementsAre;
-using testing::ElementsAreArray;
-using testing::IsEmpty;
+using namespace platform;
+using namespace testing;
 using testing_support::RecordingPresenter;
 namespace fs = std::filesystem;
 

@@ -3,7 +3,6 @@
 
 #include "host/system/files/PosixFileSystem.h"
 
-#include "host/system/coordination/LocalFileCoordinator.h"
 #include "tests/support/TemporaryDirectory.h"
 
 #include <fcntl.h>
@@ -181,19 +180,6 @@ TEST_F(FileSystemTest, WalksThousandsOfLevelsWithFewDescriptors)
     EXPECT_EQ(enumerate(directory.path()).size(), 2U * depth);
     setrlimit(RLIMIT_NOFILE, &before);
     EXPECT_TRUE(errors.empty());
-}
-
-TEST(LocalFileCoordinator, RunsTheAccessorOnceWithTheVeryLocation)
-{
-    host::system::LocalFileCoordinator coordinator;
-    const auto url = Url::fileURL("/a");
-    int runs = 0;
-    for (const auto options : {ReadingOptions::None, ReadingOptions::ImmediatelyAvailableMetadataOnly})
-        EXPECT_FALSE(coordinator.coordinateReading(url, options, [&](const Url& given) {
-            ++runs;
-            EXPECT_TRUE(given.isSameObject(url));
-        }));
-    EXPECT_EQ(runs, 2);
 }
 
 } // namespace

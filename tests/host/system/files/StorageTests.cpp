@@ -15,11 +15,8 @@
 #include <sstream>
 
 using namespace platform;
-using host::system::JsonKeyedArchiver;
-using host::system::JsonUserDefaults;
-using testing_support::RecordingLog;
-using testing_support::TemporaryDirectory;
-using testing_support::VirtualDispatch;
+using namespace host::system;
+using namespace testing_support;
 
 namespace {
 

@@ -20,10 +20,8 @@
 
 using namespace platform;
 using namespace std::chrono_literals;
-using host::system::MimeTypeRegistry;
-using host::system::ThreadedFolderLister;
-using testing_support::TemporaryDirectory;
-using testing_support::VirtualDispatch;
+using namespace host::system;
+using namespace testing_support;
 
 namespace {
 
@@ -177,17 +175,6 @@ protected:
             ASSERT_EQ(snapshot->entry(i).name, "name " + std::to_string(i));
     }
 };
-
-TEST_F(LargeFolderTest, FirstRowsAreTheFirstOfTheCompleteListWhicheverIsSeen)
-{
-    fill(9000);
-    const auto listing = list(directory.at("large"));
-    dispatch->runUntilIdle();
-    // Both snapshots came in one turn of the virtual loop, so only the complete list was delivered.
-    ASSERT_EQ(updates.size(), 1U);
-    EXPECT_EQ(updates[0]->count(), 9000U);
-    expectNaturalOrder(updates[0]);
-}
 
 TEST_F(LargeFolderTest, FolderThatTurnsUnreadableMidwayFailsWithWhatWasRead)
 {

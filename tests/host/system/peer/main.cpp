@@ -17,9 +17,7 @@
 namespace {
 
 using host::system::LocalFileCoordinator;
-using platform::ReadingOptions;
-using platform::Url;
-using platform::WritingOptions;
+using namespace platform;
 namespace fs = std::filesystem;
 
 using Words = std::vector<std::string>;

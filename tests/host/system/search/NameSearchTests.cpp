@@ -14,15 +14,9 @@
 
 namespace {
 
-using host::system::IndexedNameSearch;
-using host::system::NameFolding;
-using host::system::NameIndex;
-using platform::FolderEntryKind;
-using platform::NameSearchResults;
-using platform::Url;
-using testing::ElementsAre;
-using testing::IsEmpty;
-using testing::UnorderedElementsAre;
+using namespace host::system;
+using namespace platform;
+using namespace testing;
 using Names = std::vector<std::string>;
 
 std::string folded(std::string_view name)

@@ -12,12 +12,9 @@
 #include <clocale>
 #include <cstdlib>
 #include <map>
-#include <ostream>
 
 using namespace platform;
-using host::system::GettextLocalization;
-using host::system::IcuFormatters;
-using host::system::UserLocale;
+using namespace host::system;
 
 namespace {
 
@@ -110,44 +107,37 @@ TEST_F(LocaleTest, OtherLanguagesWithoutTheirLocaleInstalled)
     EXPECT_FALSE(services().localization().isRightToLeft());
 }
 
-struct ByteCountRow {
-    const char* locale;
-    std::uint64_t bytes;
-    ByteCountStyle style;
-    const char* text;
-    double number;
-};
-void PrintTo(const ByteCountRow& row, std::ostream* out)
+TEST(IcuFormatters, ByteCountsReadAsFilesAreShown)
 {
-    *out << row.locale << ' ' << row.bytes;
+    const struct {
+        const char* locale;
+        std::uint64_t bytes;
+        ByteCountStyle style;
+        const char* text;
+        double number;
+    } rows[] = {
+        {"en_US", 0, ByteCountStyle::File, "Zero KB", 0},
+        {"en_US", 1, ByteCountStyle::File, "1 byte", 1},
+        {"en_US", 999, ByteCountStyle::File, "999 bytes", 999},
+        {"en_US", 1000, ByteCountStyle::File, "1 KB", 1},
+        {"en_US", 1000, ByteCountStyle::Binary, "1,000 bytes", 1000},
+        {"en_US", 1024, ByteCountStyle::Binary, "1 KB", 1},
+        {"en_US", 999'499, ByteCountStyle::File, "999 KB", 999},
+        {"en_US", 999'500, ByteCountStyle::File, "1 MB", 1},
+        {"en_US", 1'048'575, ByteCountStyle::Binary, "1 MB", 1},
+        {"en_US", 1'550'000, ByteCountStyle::File, "1.6 MB", 1.6},
+        {"en_US", 1'288'490'189, ByteCountStyle::Binary, "1.2 GB", 1.2},
+        {"en_US", 1'234'000'000, ByteCountStyle::File, "1.23 GB", 1.23},
+        {"en_US", ~0ULL, ByteCountStyle::Binary, "16,384 PB", 16384},
+        {"de_DE", 1'234'000'000, ByteCountStyle::File, "1,23\u00a0GB", 1.23},
+        {"de_DE", 5000, ByteCountStyle::File, "5 KB", 5},
+    };
+    for (const auto& row : rows) {
+        const IcuFormatters formatters(row.locale);
+        EXPECT_EQ(formatters.byteCount(row.bytes, row.style, ByteCountUnit::Included), row.text);
+        EXPECT_DOUBLE_EQ(formatters.byteCountNumber(row.bytes, row.style), row.number) << row.text;
+    }
 }
-
-class ByteCount : public testing::TestWithParam<ByteCountRow> { };
-
-TEST_P(ByteCount, ReadsAsFilesAreShown)
-{
-    const auto& row = GetParam();
-    const IcuFormatters formatters(row.locale);
-    EXPECT_EQ(formatters.byteCount(row.bytes, row.style, ByteCountUnit::Included), row.text);
-    EXPECT_DOUBLE_EQ(formatters.byteCountNumber(row.bytes, row.style), row.number);
-}
-
-INSTANTIATE_TEST_SUITE_P(Rows, ByteCount,
-    testing::Values(ByteCountRow{"en_US", 0, ByteCountStyle::File, "Zero KB", 0},
-        ByteCountRow{"en_US", 1, ByteCountStyle::File, "1 byte", 1},
-        ByteCountRow{"en_US", 999, ByteCountStyle::File, "999 bytes", 999},
-        ByteCountRow{"en_US", 1000, ByteCountStyle::File, "1 KB", 1},
-        ByteCountRow{"en_US", 1000, ByteCountStyle::Binary, "1,000 bytes", 1000},
-        ByteCountRow{"en_US", 1024, ByteCountStyle::Binary, "1 KB", 1},
-        ByteCountRow{"en_US", 999'499, ByteCountStyle::File, "999 KB", 999},
-        ByteCountRow{"en_US", 999'500, ByteCountStyle::File, "1 MB", 1},
-        ByteCountRow{"en_US", 1'048'575, ByteCountStyle::Binary, "1 MB", 1},
-        ByteCountRow{"en_US", 1'550'000, ByteCountStyle::File, "1.6 MB", 1.6},
-        ByteCountRow{"en_US", 1'288'490'189, ByteCountStyle::Binary, "1.2 GB", 1.2},
-        ByteCountRow{"en_US", 1'234'000'000, ByteCountStyle::File, "1.23 GB", 1.23},
-        ByteCountRow{"en_US", ~0ULL, ByteCountStyle::Binary, "16,384 PB", 16384},
-        ByteCountRow{"de_DE", 1'234'000'000, ByteCountStyle::File, "1,23\u00a0GB", 1.23},
-        ByteCountRow{"de_DE", 5000, ByteCountStyle::File, "5 KB", 5}));
 
 TEST(IcuFormatters, DatesNumbersAndTextsFollowTheLocale)
 {
