@@ -55,17 +55,6 @@ std::map<LayoutPriority, double, std::greater<>> misses(
 
 } // namespace
 
-TEST(LayoutSolver, SatisfiesEquationsAcrossVariables)
-{
-    LayoutSolver solver;
-    const auto left = solver.addVariable(), right = solver.addVariable(), width = solver.addVariable();
-    add(solver, {{{left, 1}}, Equal, 16, required});
-    add(solver, {{{right, 1}, {left, -1}, {width, -1}}, Equal, 0, required});
-    add(solver, {{{right, 1}}, Equal, 344, required});
-    EXPECT_TRUE(solver.solve().empty());
-    EXPECT_DOUBLE_EQ(solver.value(width), 328);
-}
-
 TEST(LayoutSolver, GivesUpAnyNumberOfLowPrioritiesForOneHigher)
 {
     LayoutSolver solver;
