@@ -56,6 +56,13 @@ TEST_P(Sweep, AKillAtAnyCallLosesNothingAndTheNextStartPutsItRight)
             return Fault{Fault::Kind::Kill};
         });
         SCOPED_TRACE("killed at call " + std::to_string(point) + ", " + what);
+        if (ending.calls < point) {
+            // The index of identifiers follows a change in the background, and the program may end before it
+            // does.
+            ASSERT_EQ(ending.status, 0);
+            EXPECT_TRUE(seen() == after) << differences(seen(), after);
+            continue;
+        }
         ASSERT_TRUE(ending.wasKilled);
         EXPECT_TRUE(isNothingHalf(seen(), before));
         EXPECT_TRUE(isAllThere(isRemoval() ? after : before));
