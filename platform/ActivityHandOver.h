@@ -21,7 +21,7 @@ struct ActivityOffer {
     std::string deviceName;
     /// What the device is doing. Only texts of its user information travel between devices.
     UserActivity activity;
-    /// Where the activity's document lies on this device, here or promised.
+    /// Names the activity's document on this device, which is here or promised.
     Url document;
     /// When the device last announced the activity, by that device's clock, in whole seconds.
     Date time;

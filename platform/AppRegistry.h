@@ -25,7 +25,7 @@ struct AppHandle {
     bool isInstalled = false;
     /// The identifier of the app's description; on Linux the same as `itemName`.
     std::string itemIdentifier;
-    /// What the app does, in the user's language.
+    /// Says in the user's language what the app does.
     std::string description;
     /// Whether the app works on a document where the document lies, in a window of the app's own.
     bool supportsOpenInPlace = false;

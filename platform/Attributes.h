@@ -53,7 +53,7 @@ inline constexpr std::size_t attributeKeyCount =
 /// Whether the account's user shares an item with others, or somebody else shares it with the user.
 enum class SharedItemRole : std::uint8_t { Owner, Participant };
 
-/// How much of an item's content is on this device.
+/// Says which part of an item's content is on this device.
 enum class DownloadingStatus : std::uint8_t {
     NotDownloaded, ///< only the promise of the item is here
     Downloaded, ///< a copy is here, which may be older than the one in the cloud

@@ -30,7 +30,7 @@ struct DocumentContainer {
     std::string localizedName;
     std::optional<Url> documentsURL; ///< the folder of its documents; nothing while that folder is missing
     std::vector<DocumentType> documentTypes; ///< the kinds of documents that its apps declare
-    /// How deep folders may lie in it, as one of `folderLevels`; nothing when it declares none.
+    /// Limits the depth of its folders, as one of `folderLevels`; nothing when it declares none.
     std::optional<std::string> supportedFolderLevels;
     std::vector<std::string> owningApps; ///< application identifiers, the most important one first
     std::optional<std::string> iconName; ///< the icon of the owning app, in the icon theme

@@ -12,7 +12,7 @@ namespace host::drive {
 /// no link. When two items carry one identifier (a copy with its attributes), the older one counts.
 class DocumentFinder {
 public:
-    /// How many names one search reads.
+    /// Limits the number of names that one search reads.
     enum class Effort : std::size_t {
         Unnoticed = 10'000, ///< takes some ten milliseconds, for the main thread
         Whole = 100'000'000,

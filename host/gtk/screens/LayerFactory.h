@@ -15,7 +15,7 @@ class ViewController;
 
 namespace host::gtk {
 
-/// Where layers are added: over `overlay`, popovers on `canvas`, in a window of this size.
+/// Names where layers are added: to `overlay`, popovers to `canvas`; the size is that of the window.
 struct LayerSite {
     GtkOverlay* overlay;
     GtkWidget* canvas;
