@@ -50,8 +50,6 @@ std::string withoutExtraSlashes(std::string_view path)
     // Nearly every path has none: a plain copy is enough, and this is done for every row of a list.
     if (path.find("//") == std::string_view::npos && (path.size() <= 1 || !path.ends_with('/')))
         return std::string(path);
-    if (path.find("//") == std::string_view::npos && (path.size() < 2 || path.back() != '/'))
-        return std::string(path);
     std::string out;
     out.reserve(path.size());
     for (const char c : path) {
@@ -123,10 +121,10 @@ std::optional<Url> Url::parse(std::string_view text)
     }
     auto path = percentDecoded(place);
     auto query = parseQuery(hasQuery ? rest : std::string_view{});
-    if (!path || !query || hasEncodedSlash(place)
-        || (!data->scheme.starts_with("file") && !isValidUtf8(*path)))
+    if (!path || !query || hasEncodedSlash(place))
         return std::nullopt;
-    if (data->scheme == "file" && !path->starts_with('/'))
+    const bool isValid = data->scheme == "file" ? path->starts_with('/') : isValidUtf8(*path);
+    if (!isValid)
         return std::nullopt;
     data->kind = path->size() > 1 && path->ends_with('/') ? PathKind::Directory : PathKind::Unknown;
     data->path = withoutExtraSlashes(*path);

@@ -3,6 +3,7 @@
 
 #include "host/drive/service/ThumbnailCache.h"
 
+#include "host/system/desktop/PixbufImage.h"
 #include "platform/Log.h"
 #include "platform/Weakly.h"
 
@@ -16,13 +17,8 @@ namespace host::drive {
 
 namespace {
 
-using platform::Image;
 using platform::weakly;
-
-struct Unref {
-    void operator()(GdkPixbuf* pixbuf) const { g_object_unref(pixbuf); }
-};
-using Pixbuf = std::unique_ptr<GdkPixbuf, Unref>;
+using system::Pixbuf;
 
 struct FreeText {
     void operator()(char* text) const { g_free(text); }
@@ -44,29 +40,6 @@ std::string entryPath(const std::string& folder, const std::string& uri)
 {
     const Text name(g_compute_checksum_for_string(G_CHECKSUM_MD5, uri.c_str(), -1));
     return folder + "/xx-large/" + name.get() + ".png";
-}
-
-std::uint32_t premultiplied(const guchar* pixel, bool hasAlpha)
-{
-    const unsigned alpha = hasAlpha ? pixel[3] : 255;
-    const auto channel = [alpha](unsigned value) { return (value * alpha + 127) / 255; };
-    return alpha << 24 | channel(pixel[0]) << 16 | channel(pixel[1]) << 8 | channel(pixel[2]);
-}
-
-Image imageFrom(GdkPixbuf* pixbuf)
-{
-    const int width = gdk_pixbuf_get_width(pixbuf), height = gdk_pixbuf_get_height(pixbuf);
-    const int channels = gdk_pixbuf_get_n_channels(pixbuf), stride = gdk_pixbuf_get_rowstride(pixbuf);
-    const bool hasAlpha = gdk_pixbuf_get_has_alpha(pixbuf);
-    const guchar* bytes = gdk_pixbuf_read_pixels(pixbuf);
-    std::vector<std::uint32_t> pixels;
-    pixels.reserve(static_cast<std::size_t>(width) * static_cast<std::size_t>(height));
-    for (int y = 0; y < height; ++y) {
-        for (int x = 0; x < width; ++x)
-            pixels.push_back(
-                premultiplied(bytes + y * static_cast<std::ptrdiff_t>(stride) + x * channels, hasAlpha));
-    }
-    return Image::fromPixels(width, height, 1, std::move(pixels));
 }
 
 // Answers the entry for this version of the file, or null when it is missing or was made from another
@@ -154,7 +127,8 @@ platform::ThumbnailMap ThumbnailCache::thumbnails(
         else
             picture = make(_folder, url.path(), modified);
     }
-    return picture ? platform::ThumbnailMap{{pixelSize, imageFrom(picture.get())}} : platform::ThumbnailMap{};
+    return picture ? platform::ThumbnailMap{{pixelSize, system::imageOf(picture.get(), 1)}}
+                   : platform::ThumbnailMap{};
 }
 
 void ThumbnailCache::makeLater(const std::string& path, platform::Date modified)

@@ -5,6 +5,7 @@
 
 #include "host/system/desktop/GifFrames.h"
 #include "host/system/desktop/JpegEnd.h"
+#include "host/system/desktop/PixbufImage.h"
 #include "host/system/files/FileDescriptor.h"
 #include "host/system/files/SystemErrors.h"
 
@@ -34,11 +35,7 @@ using platform::Result;
 
 namespace {
 
-struct Unref {
-    void operator()(gpointer object) const { g_object_unref(object); }
-};
-using Pixbuf = std::unique_ptr<GdkPixbuf, Unref>;
-using Animation = std::unique_ptr<GdkPixbufAnimation, Unref>;
+using Animation = std::unique_ptr<GdkPixbufAnimation, UnrefObject>;
 using Cancelled = std::function<bool()>;
 
 Error imageError(ImageErrorCode code)
@@ -108,30 +105,6 @@ Pixbuf upright(const GdkPixbuf* decoded, const ImageLimits& limits)
     return turned;
 }
 
-std::uint32_t premultiplied(const guchar* pixel, bool hasAlpha)
-{
-    const std::uint32_t alpha = hasAlpha ? pixel[3] : 255;
-    const auto component = [&](int index) { return (pixel[index] * alpha + 127) / 255; };
-    return alpha << 24 | component(0) << 16 | component(1) << 8 | component(2);
-}
-
-Image imageOf(const GdkPixbuf* pixbuf, double scale)
-{
-    const int width = gdk_pixbuf_get_width(pixbuf), height = gdk_pixbuf_get_height(pixbuf);
-    const auto rowBytes = static_cast<std::size_t>(gdk_pixbuf_get_rowstride(pixbuf));
-    const auto channels = static_cast<std::size_t>(gdk_pixbuf_get_n_channels(pixbuf));
-    const bool hasAlpha = gdk_pixbuf_get_has_alpha(pixbuf);
-    const guchar* bytes = gdk_pixbuf_read_pixels(pixbuf);
-    std::vector<std::uint32_t> pixels;
-    pixels.reserve(static_cast<std::size_t>(width) * static_cast<std::size_t>(height));
-    for (int y = 0; y < height; ++y) {
-        const guchar* row = bytes + static_cast<std::size_t>(y) * rowBytes;
-        for (int x = 0; x < width; ++x)
-            pixels.push_back(premultiplied(row + static_cast<std::size_t>(x) * channels, hasAlpha));
-    }
-    return Image::fromPixels(width, height, scale, std::move(pixels));
-}
-
 /// A file that is read piece by piece, so that the reading can be cancelled.
 class PictureFile {
 public:
@@ -192,7 +165,7 @@ public:
     }
 
 private:
-    std::unique_ptr<GdkPixbufLoader, Unref> _loader;
+    std::unique_ptr<GdkPixbufLoader, UnrefObject> _loader;
     PixelSize _size;
     bool _ended = false;
 };
@@ -248,7 +221,7 @@ std::vector<Picture::Frame> framesOf(
 {
     std::vector<Picture::Frame> frames;
     AnimationTime now{};
-    const std::unique_ptr<GdkPixbufAnimationIter, Unref> step(
+    const std::unique_ptr<GdkPixbufAnimationIter, UnrefObject> step(
         gdk_pixbuf_animation_get_iter(decoded.animation.get(), &now));
     while (frames.size() < decoded.frames && !isCancelled()) {
         const auto shown = upright(gdk_pixbuf_animation_iter_get_pixbuf(step.get()), limits);
