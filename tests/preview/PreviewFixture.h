@@ -4,18 +4,18 @@
 #pragma once
 
 #include "items/DRItem.h"
-#include "kit/controllers/AlertController.h"
 #include "kit/controllers/NavigationController.h"
 #include "kit/controllers/Window.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewDetailsViewController.h"
 #include "preview/PreviewItemManager.h"
-#include "tests/screens/support/ComponentsFixture.h"
+#include "screens/list/DocumentListController.h"
+#include "tests/screens/support/ScreensFixture.h"
 
 namespace testing_support {
 
 /// A manager over a stack in a window of a phone's size, with one screen below.
-class PreviewFixture : public ComponentsFixture {
+class PreviewFixture : public ScreensFixture {
 protected:
     PreviewFixture()
     {
@@ -32,10 +32,7 @@ protected:
     {
         return tarrow::DRItem::initWithURL(drive.writeDocument(name, "content of " + std::string(name)));
     }
-    std::shared_ptr<kit::AlertController> alert() const
-    {
-        return std::dynamic_pointer_cast<kit::AlertController>(navigation->presentedViewController());
-    }
+    std::shared_ptr<kit::AlertController> alert() const { return alertOver(*navigation); }
     /// Answers the last names of the shown folders, "*" for the quick preview, "i" for a details screen and
     /// "-" for another screen.
     std::vector<std::string> stack() const
@@ -43,11 +40,10 @@ protected:
         std::vector<std::string> names;
         for (const auto& screen : navigation->viewControllers()) {
             const auto list = std::dynamic_pointer_cast<screens::DocumentListController>(screen);
-            const bool isDetails =
-                std::dynamic_pointer_cast<tarrow::PreviewDetailsViewController>(screen) != nullptr;
+            const auto details = std::dynamic_pointer_cast<tarrow::PreviewDetailsViewController>(screen);
             names.push_back(list        ? list->presentedURL()->lastPathComponent()
                     : screen == preview ? "*"
-                    : isDetails         ? "i"
+                    : details           ? "i"
                                         : "-");
         }
         return names;

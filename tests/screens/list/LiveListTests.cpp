@@ -5,9 +5,11 @@
 // gives.
 
 #include "screens/list/FolderContents.h"
-#include "tests/screens/support/ComponentsFixture.h"
+#include "tests/support/DriveFixture.h"
 
 #include <algorithm>
+#include <chrono>
+#include <functional>
 #include <random>
 
 using namespace platform;
@@ -38,10 +40,8 @@ void PrintTo(const NamedOrder& row, std::ostream* stream)
     *stream << row.name;
 }
 
-class LiveList : public testing_support::ComponentsFixture, public testing::WithParamInterface<NamedOrder> {
+class LiveList : public testing::TestWithParam<NamedOrder> {
 protected:
-    LiveList() { useRealLister(); }
-
     /// A list, and the rows that a view would have after its changes.
     struct Followed {
         std::shared_ptr<FolderContents> contents;
@@ -80,6 +80,20 @@ protected:
                 followed.lines[row] = after[row];
         EXPECT_TRUE(std::ranges::equal(followed.ids, ids));
         EXPECT_EQ(followed.lines, after) << "a row shows what it was";
+    }
+
+    /// Runs the kernel's notices and the virtual clock until the condition holds. Answers false when it never
+    /// does.
+    bool waitUntil(const std::function<bool()>& condition) const
+    {
+        const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(60);
+        while (!condition()) {
+            if (std::chrono::steady_clock::now() > deadline)
+                return false;
+            drive.settle();
+            drive.dispatch->advance(0.01);
+        }
+        return true;
     }
 
     std::string path(const std::string& name) const { return drive.url("Stuff/" + name).path(); }
@@ -127,6 +141,7 @@ protected:
         return fresh->lines;
     }
 
+    testing_support::DriveFixture drive;
     std::mt19937 _random{7};
 };
 

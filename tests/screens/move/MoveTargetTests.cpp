@@ -1,12 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "tests/screens/support/ComponentsFixture.h"
+#include "tests/screens/support/ScreensFixture.h"
 
-#include "host/drive/records/ContainerRecord.h"
-#include "kit/controllers/AlertController.h"
-#include "kit/controllers/NavigationItem.h"
-#include "kit/views/ListView.h"
 #include "kit/views/TextField.h"
 #include "platform/FileSystem.h"
 #include "screens/PlaceholderView.h"
@@ -16,12 +12,12 @@
 using namespace platform;
 using namespace screens;
 using namespace testing;
-using testing_support::ComponentsFixture;
+using testing_support::Lines;
+using testing_support::ScreensFixture;
 
 namespace {
 
 using Kind = FolderEntryKind;
-using Lines = std::vector<std::string>;
 
 struct RecordingPickerDelegate : MoveTargetPickerDelegate {
     void documentTargetSelectionControllerDidSelectItemAtURL(
@@ -36,7 +32,7 @@ struct RecordingPickerDelegate : MoveTargetPickerDelegate {
     Lines lines;
 };
 
-class MoveTarget : public ComponentsFixture {
+class MoveTarget : public ScreensFixture {
 protected:
     std::shared_ptr<MoveTargetPicker> pick(
         std::vector<Url> items, MoveTargetScope scope = MoveTargetScope::Container)
@@ -47,74 +43,39 @@ protected:
         load(*picker);
         return picker;
     }
-    /// Shows the top screen, and waits until it has read the disk.
-    std::shared_ptr<MoveTargetScreen> load(const MoveTargetPicker& picker)
+    /// Shows the top screen with a listing, and waits until it has read the disk.
+    std::shared_ptr<MoveTargetScreen> load(
+        const MoveTargetPicker& picker, const testing_support::HandLister::Entries& entries = {})
     {
         auto screen = std::static_pointer_cast<MoveTargetScreen>(picker.topViewController());
         screen->view()->setFrame({0, 0, 360, 600});
         screen->view()->layoutIfNeeded();
         drive.settle();
+        lister->deliver(screen->folder(), entries);
+        drive.dispatch->runUntilIdle();
         return screen;
     }
-    static Lines stack(const MoveTargetPicker& picker)
+    static std::string folderOf(const MoveTargetPicker& picker)
     {
-        Lines names;
-        for (const auto& screen : picker.viewControllers())
-            names.push_back(std::static_pointer_cast<MoveTargetScreen>(screen)->folder().lastPathComponent());
-        return names;
-    }
-    static Lines rows(const MoveTargetScreen& screen)
-    {
-        Lines titles;
-        for (std::size_t row = 0; row < screen.listView()->rowCount(); ++row)
-            titles.push_back(screen.listView()->row(row).title);
-        return titles;
-    }
-    void show(const MoveTargetScreen& screen, const testing_support::HandLister::Entries& entries)
-    {
-        lister->deliver(screen.folder(), entries);
-        drive.dispatch->runUntilIdle();
-    }
-    static std::shared_ptr<kit::BarButtonItem> moveButton(const MoveTargetScreen& screen)
-    {
-        return screen.toolbarItems().back();
+        const auto screen = std::static_pointer_cast<MoveTargetScreen>(picker.topViewController());
+        return screen->folder().lastPathComponent();
     }
 
     std::shared_ptr<kit::ViewController> base = std::make_shared<kit::ViewController>();
     std::shared_ptr<RecordingPickerDelegate> told = std::make_shared<RecordingPickerDelegate>();
 };
 
-TEST_F(MoveTarget, StartsWhereTheItemsAreAndLetsOnlyOtherFoldersBeChosen)
-{
-    const auto item = drive.writeDocument("Trips/Italy/plan.txt");
-    drive.makeFolder("Trips/Italy/Rome");
-    const auto picker = pick({item});
-    EXPECT_THAT(stack(*picker), testing::Contains("Italy"));
-    EXPECT_EQ(stack(*picker).back(), "Italy");
-    auto screen = load(*picker);
-    show(*screen, {{"Rome", Kind::Folder}, {"plan.txt"}, {"Deck.key", Kind::Package}});
-    EXPECT_THAT(rows(*screen), ElementsAre("Rome"));
-    EXPECT_FALSE(moveButton(*screen)->press());
-
-    screen->listView()->activateRow(0);
-    screen = load(*picker);
-    EXPECT_TRUE(moveButton(*screen)->press());
-    moveButton(*screen)->press();
-    EXPECT_THAT(told->lines, ElementsAre("to Rome"));
-}
-
 TEST_F(MoveTarget, DimsFoldersThatAreToBeMovedAndDoesNotEnterThem)
 {
     const auto moved = drive.makeFolder("Trips/Italy");
     const auto picker = pick({moved});
-    const auto screen = load(*picker);
-    show(*screen, {{"Italy", Kind::Folder}, {"Spain", Kind::Folder}});
+    const auto screen = load(*picker, {{"Italy", Kind::Folder}, {"Spain", Kind::Folder}});
     EXPECT_TRUE(screen->listView()->row(0).isDimmed);
     EXPECT_FALSE(screen->listView()->row(1).isDimmed);
     screen->listView()->activateRow(0);
-    EXPECT_EQ(stack(*picker).back(), "Trips");
+    EXPECT_EQ(folderOf(*picker), "Trips");
     screen->listView()->activateRow(1);
-    EXPECT_EQ(stack(*picker).back(), "Spain");
+    EXPECT_EQ(folderOf(*picker), "Spain");
 }
 
 TEST_F(MoveTarget, LeadsToOtherContainersOnlyWhereTheMoveMay)
@@ -124,16 +85,14 @@ TEST_F(MoveTarget, LeadsToOtherContainersOnlyWhereTheMoveMay)
     const auto inLibrary = library.appendingPathComponent("Sketch.txt");
 
     const auto plain = pick({inDrive});
-    auto screen = load(*plain);
-    show(*screen, {{"Stuff", Kind::Folder}});
-    EXPECT_THAT(rows(*screen), ElementsAre("Stuff"));
+    auto screen = load(*plain, {{"Stuff", Kind::Folder}});
+    EXPECT_THAT(titles(*screen->listView()), ElementsAre("Stuff"));
     EXPECT_FALSE(plain->offers(library));
     plain->cancel();
 
     const auto crossing = pick({inDrive}, MoveTargetScope::AllContainers);
-    screen = load(*crossing);
-    show(*screen, {{"Stuff", Kind::Folder}});
-    EXPECT_EQ(rows(*screen).size(), 2U);
+    screen = load(*crossing, {{"Stuff", Kind::Folder}});
+    EXPECT_EQ(titles(*screen->listView()).size(), 2U);
     EXPECT_TRUE(crossing->offers(library));
     crossing->cancel();
 
@@ -157,12 +116,11 @@ TEST_F(MoveTarget, OffersTheLastDestinationsThatAreStillThere)
     EXPECT_THAT(told->lines, ElementsAre("to 2025", "to Vanished"));
 
     const auto third = pick({item});
-    const auto screen = load(*third);
-    show(*screen, {{"Stuff", Kind::Folder}});
-    EXPECT_THAT(rows(*screen), ElementsAre("Recent", "2025", "Folders", "Stuff"));
+    const auto screen = load(*third, {{"Stuff", Kind::Folder}});
+    EXPECT_THAT(titles(*screen->listView()), ElementsAre("Recent", "2025", "Folders", "Stuff"));
     screen->listView()->activateRow(1);
-    EXPECT_EQ(stack(*third).back(), "2025");
-    EXPECT_TRUE(moveButton(*load(*third))->isEnabled());
+    EXPECT_EQ(folderOf(*third), "2025");
+    EXPECT_TRUE(load(*third)->toolbarItems().back()->isEnabled());
 }
 
 TEST_F(MoveTarget, MakesAFolderAndEntersItOrSaysWhyNot)
@@ -171,7 +129,7 @@ TEST_F(MoveTarget, MakesAFolderAndEntersItOrSaysWhyNot)
     const auto screen = load(*picker);
     const auto ask = [&](const std::string& name) {
         screen->askForNewFolder();
-        const auto alert = std::static_pointer_cast<kit::AlertController>(picker->presentedViewController());
+        const auto alert = alertOver(*picker);
         alert->textFields().front()->userEdited(name, {});
         const bool pressed = alert->press(1);
         if (!pressed)
@@ -183,26 +141,25 @@ TEST_F(MoveTarget, MakesAFolderAndEntersItOrSaysWhyNot)
         EXPECT_FALSE(ask(refused)) << refused;
     drive.writeDocument("Taken");
     EXPECT_TRUE(ask("Taken"));
-    const auto failure = std::static_pointer_cast<kit::AlertController>(picker->presentedViewController());
+    const auto failure = alertOver(*picker);
     ASSERT_TRUE(failure);
     EXPECT_FALSE(failure->message().empty());
     failure->press(std::size_t{0});
     EXPECT_TRUE(ask("  Fresh  "));
-    EXPECT_EQ(stack(*picker).back(), "Fresh");
+    EXPECT_EQ(folderOf(*picker), "Fresh");
     EXPECT_EQ(services().fileSystem().typeOfItem(drive.url("Fresh").path()), FileType::Directory);
 }
 
 TEST_F(MoveTarget, SaysWhenThereAreNoFoldersAndWhenTheFolderIsGone)
 {
     const auto picker = pick({drive.writeDocument("Stuff/Notes.txt")});
-    const auto screen = load(*picker);
-    show(*screen, {{"Notes.txt"}});
+    const auto screen = load(*picker, {{"Notes.txt"}, {"Deck.key", Kind::Package}});
     EXPECT_FALSE(screen->placeholder()->isHidden());
     EXPECT_EQ(screen->placeholder()->content().title, localized("No folders here"));
     lister->fail(screen->folder(), Error(FileErrorCode::NoSuchItem));
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(screen->placeholder()->content().title, localized("This folder cannot be shown"));
-    EXPECT_FALSE(moveButton(*screen)->isEnabled());
+    EXPECT_FALSE(screen->toolbarItems().back()->isEnabled());
 }
 
 } // namespace

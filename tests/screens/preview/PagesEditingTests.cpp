@@ -2,7 +2,7 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "platform/PagedDocumentEditing.h"
-#include "tests/screens/support/ComponentsFixture.h"
+#include "tests/screens/support/ScreensFixture.h"
 #include "tests/support/FormPdf.h"
 #include "tests/support/SimplePdf.h"
 
@@ -17,7 +17,7 @@ using Kind = PageMark::Kind;
 /// The fields of the form by their indexes.
 enum Place : std::size_t { Name, Agree, Town, First, Second };
 
-class PagesEditing : public ComponentsFixture {
+class PagesEditing : public ScreensFixture {
 protected:
     static std::shared_ptr<PagedDocumentEditing> edit(const std::string& pdf)
     {

@@ -4,7 +4,7 @@
 #include "platform/PagedDocument.h"
 #include "screens/preview/PageDeck.h"
 #include "screens/preview/PreviewPagesView.h"
-#include "tests/screens/support/ComponentsFixture.h"
+#include "tests/screens/support/ScreensFixture.h"
 #include "tests/support/SimplePdf.h"
 
 #include <set>
@@ -18,11 +18,6 @@ namespace {
 
 constexpr Size sheet{200, 300};
 
-Image pixels(int width, int height)
-{
-    return Image::fromPixels(width, height, 1, {});
-}
-
 PageDeck deckOf(std::size_t pages, Size size = sheet)
 {
     PageDeck deck;
@@ -33,8 +28,8 @@ PageDeck deckOf(std::size_t pages, Size size = sheet)
 
 Image drawn(const PageDeck::Task& task)
 {
-    return pixels(static_cast<int>(task.part.width * task.pixelsPerPoint),
-        static_cast<int>(task.part.height * task.pixelsPerPoint));
+    return Image::fromPixels(static_cast<int>(task.part.width * task.pixelsPerPoint),
+        static_cast<int>(task.part.height * task.pixelsPerPoint), 1, {});
 }
 
 TEST(PageDeckTest, PlacesPagesBelowEachOtherAndGrowsWithTheZoom)
@@ -132,7 +127,7 @@ struct Peer : PreviewViewObserver {
     std::vector<Rect> places;
 };
 
-class Pages : public ComponentsFixture {
+class Pages : public ScreensFixture {
 protected:
     Pages()
     {
@@ -165,20 +160,6 @@ protected:
     std::shared_ptr<Peer> peer = std::make_shared<Peer>();
     std::shared_ptr<PreviewPagesView> view = std::make_shared<PreviewPagesView>();
 };
-
-TEST_F(Pages, DrawsThePagesThatAreSeen)
-{
-    show({"one", "two", "three", "four", "five"});
-    EXPECT_FALSE(view->deck().picture(0));
-    see(0);
-    EXPECT_TRUE(hasInk(0));
-    EXPECT_FALSE(view->deck().picture(4));
-    see(view->deck().pageFrame(4).y);
-    EXPECT_EQ(view->currentPage(), 4U);
-    EXPECT_TRUE(hasInk(4));
-    view->goToPage(2);
-    EXPECT_EQ(peer->places.back().y, view->deck().pageFrame(2).y - PageDeck::gap);
-}
 
 TEST_F(Pages, FindsTextsFromThePageThatIsReadAndGoesAround)
 {
@@ -226,13 +207,6 @@ TEST_F(Pages, KeepsPlaceZoomAndSearchWhenTheDocumentChanges)
     EXPECT_EQ(view->searchState().matches, 2U);
     EXPECT_TRUE(peer->places.empty());
     EXPECT_TRUE(hasInk(2));
-
-    // The document is truncated while it is shown. The part that can still be read is shown.
-    show({"one"});
-    EXPECT_EQ(view->pageCount(), 1U);
-    see(0);
-    EXPECT_TRUE(hasInk(0));
-    EXPECT_EQ(view->searchState(), (SearchState{0, 0, true}));
 }
 
 TEST_F(Pages, SelectsTextAcrossPages)
@@ -266,37 +240,12 @@ TEST_F(Pages, StopsWorkingOnADocumentThatIsNoLongerShown)
     drive.dispatch->runUntilIdle();
 }
 
-struct OpenRow {
-    const char* name;
-    std::string bytes;
-    PagesErrorCode code;
-};
-
-TEST_F(Pages, SaysWhyADocumentCannotBeOpened)
+TEST_F(Pages, DrawsNoMorePixelsThanItsLimitAllows)
 {
-    const auto whole = simplePdf({"page"});
-    const OpenRow rows[] = {
-        {"empty", "", PagesErrorCode::Damaged},
-        {"no document", "just words", PagesErrorCode::Damaged},
-        {"cut off before its pages", whole.substr(0, 60), PagesErrorCode::Damaged},
-        {"without pages", simplePdf({}), PagesErrorCode::Damaged},
-        {"with a password", testing_support::passwordPdf(), PagesErrorCode::PasswordRequired},
-    };
-    for (const auto& row : rows) {
-        SCOPED_TRACE(row.name);
-        const auto path = drive.writeDocument("Bad.pdf", row.bytes).path();
-        const auto opened = services().pagedDocumentOpener().open(path);
-        ASSERT_TRUE(opened.error);
-        EXPECT_EQ(opened.error->domain(), errorDomain::pages);
-        EXPECT_EQ(opened.error->code(), static_cast<int>(row.code));
-    }
-    const auto missing = services().pagedDocumentOpener().open(drive.url("Missing.pdf").path());
-    EXPECT_TRUE(missing.error->is(FileErrorCode::NoSuchFile));
-
-    const auto open = write({"page"});
-    EXPECT_EQ(open->renderPage(0, 1000, {0, 0, 200, 300}).error->code(),
+    const auto document = write({"page"});
+    EXPECT_EQ(document->renderPage(0, 1000, {0, 0, 200, 300}).error->code(),
         static_cast<int>(PagesErrorCode::TooLarge));
-    EXPECT_EQ(open->renderPage(0, 0.5, {0, 0, 200, 300}).value->pixelHeight(), 150);
+    EXPECT_EQ(document->renderPage(0, 0.5, {0, 0, 200, 300}).value->pixelHeight(), 150);
 }
 
 } // namespace

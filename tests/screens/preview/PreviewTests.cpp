@@ -17,7 +17,7 @@
 #include "screens/preview/PreviewTextView.h"
 #include "screens/preview/PreviewToolbar.h"
 #include "screens/preview/TextDecoding.h"
-#include "tests/screens/support/ComponentsFixture.h"
+#include "tests/screens/support/ScreensFixture.h"
 #include "tests/support/SimplePdf.h"
 
 #include <sys/stat.h>
@@ -25,7 +25,7 @@
 using namespace platform;
 using namespace screens;
 using testing::HasSubstr;
-using testing_support::ComponentsFixture;
+using testing_support::ScreensFixture;
 using Kind = PreviewContent::Kind;
 
 namespace {
@@ -43,7 +43,7 @@ struct Documents : PreviewControllerDataSource {
     std::vector<Url> urls;
 };
 
-class Preview : public ComponentsFixture {
+class Preview : public ScreensFixture {
 protected:
     Preview()
     {
@@ -54,6 +54,17 @@ protected:
     {
         documents->urls = std::move(urls);
         screen->reloadData();
+    }
+    /// Shows a document and runs what follows.
+    void open(const Url& url)
+    {
+        show({url});
+        drive.dispatch->runUntilIdle();
+    }
+    void readAgain() const
+    {
+        screen->refreshCurrentPreviewItem();
+        drive.dispatch->runUntilIdle();
     }
     const PlaceholderView::Content& summary() const
     {
@@ -77,7 +88,8 @@ struct Row {
 
 TEST_F(Preview, ChoosesWhatToShowByTheDocument)
 {
-    const auto secret = testing_support::passwordPdf(), plan = testing_support::simplePdf({"one", "two"});
+    const auto secret = testing_support::passwordPdf(), plan = testing_support::simplePdf({"one", "two"}),
+               pageless = testing_support::simplePdf({});
     const Row rows[] = {
         {"Good.pdf", plan, Kind::Pages, ""},
         {"Picture.png", twoPixels, Kind::Image, ""},
@@ -85,6 +97,7 @@ TEST_F(Preview, ChoosesWhatToShowByTheDocument)
         {"Notes.txt", "Hello", Kind::Text, ""},
         {"Empty.txt", "", Kind::Text, "empty"},
         {"Plan.pdf", "%PDF-1.4", Kind::Failure, "damaged"},
+        {"Pageless.pdf", pageless, Kind::Failure, "damaged"},
         {"Secret.pdf", secret, Kind::Failure, "password"},
         {"Song.wav", "RIFF", Kind::Sound, "4 bytes"},
         {"Film.mp4", "ftyp", Kind::Film, "4 bytes"},
@@ -104,21 +117,18 @@ TEST_F(Preview, ChoosesWhatToShowByTheDocument)
 
 TEST_F(Preview, SaysWhyADocumentCannotBeShown)
 {
-    show({drive.url("Gone.txt")});
-    drive.dispatch->runUntilIdle();
+    open(drive.url("Gone.txt"));
     EXPECT_EQ(screen->content()->kind, Kind::Failure);
     EXPECT_FALSE(summary().message.empty());
 
-    show({drive.writePromise("Far.txt", {})});
-    drive.dispatch->runUntilIdle();
+    open(drive.writePromise("Far.txt", {}));
     EXPECT_EQ(screen->content()->kind, Kind::InCloud);
     EXPECT_THAT(summary().message, HasSubstr("in the cloud"));
     EXPECT_FALSE(std::filesystem::exists(drive.url("Far.txt").path()));
 
     // Opening a pipe would block a reader for ever.
     ASSERT_EQ(::mkfifo(drive.url("Pipe.txt").path().c_str(), 0600), 0);
-    show({drive.url("Pipe.txt")});
-    drive.dispatch->runUntilIdle();
+    open(drive.url("Pipe.txt"));
     EXPECT_EQ(screen->content()->kind, Kind::Summary);
 
     show({});
@@ -146,14 +156,10 @@ TEST_F(Preview, CutsLongTextsAndSaysSo)
     EXPECT_THAT(lines.text, testing::EndsWith("x…\nend"));
     EXPECT_THAT(lines.note, HasSubstr("very long lines"));
 
-    show({drive.url("Long.txt")});
-    drive.dispatch->runUntilIdle();
+    open(drive.url("Long.txt"));
     screen->view()->layoutIfNeeded();
     EXPECT_EQ(screen->screenView()->note(), cut.note);
-    const auto place = screen->previewView()->frame();
-    EXPECT_GT(place.y, 0);
-    EXPECT_EQ(place.maxY(), 600 - PreviewToolbar::barHeight);
-    EXPECT_EQ(place.width, 360);
+    EXPECT_GT(screen->previewView()->frame().y, 0);
 }
 
 TEST_F(Preview, ReadsNoMorePixelsThanAreSeen)
@@ -161,8 +167,7 @@ TEST_F(Preview, ReadsNoMorePixelsThanAreSeen)
     kit::Screen::setMain(kit::Screen{{0, 0, 10, 5}, 2, kit::UserInterfaceIdiom::Phone, {}});
     std::string picture = "P6 100 100 255\n";
     picture.append(30'000, 'z');
-    show({drive.writeDocument("Large.png", picture)});
-    drive.dispatch->runUntilIdle();
+    open(drive.writeDocument("Large.png", picture));
     const auto view = std::dynamic_pointer_cast<PreviewPictureView>(screen->previewView());
     ASSERT_TRUE(view);
     EXPECT_EQ(view->picture().frames.front().image.pixelHeight(), 10);
@@ -180,16 +185,9 @@ TEST_F(Preview, IgnoresWhatArrivesForAnEarlierDocument)
     const auto first = drive.writeDocument("First.txt", "first");
     const auto second = drive.writeDocument("Second.txt", "second");
     show({first});
-    show({second});
-    drive.dispatch->runUntilIdle();
+    open(second);
     EXPECT_EQ(screen->content()->text, "second");
     EXPECT_EQ(screen->currentPreviewItem(), second);
-
-    drive.writeDocument("Second.txt", "second, changed");
-    screen->refreshCurrentPreviewItem();
-    EXPECT_EQ(screen->content()->text, "second");
-    drive.dispatch->runUntilIdle();
-    EXPECT_EQ(screen->content()->text, "second, changed");
 }
 
 TEST_F(Preview, ShowsThatItIsLoadingOnlyAfterAWhile)
@@ -205,23 +203,6 @@ TEST_F(Preview, ShowsThatItIsLoadingOnlyAfterAWhile)
     EXPECT_EQ(text->text().text, "Hello");
     drive.dispatch->advance(1);
     EXPECT_EQ(late->screenView()->content(), text);
-}
-
-/// Answers the titles of the buttons below the text.
-std::vector<std::string> offers(const PreviewController& screen)
-{
-    std::vector<std::string> titles;
-    const auto view = std::dynamic_pointer_cast<PlaceholderView>(screen.screenView()->content());
-    for (const auto& button : view ? view->buttons() : std::vector<std::shared_ptr<kit::Button>>())
-        titles.push_back(button->title());
-    return titles;
-}
-
-void press(const PreviewController& screen)
-{
-    const auto view = std::dynamic_pointer_cast<PlaceholderView>(screen.screenView()->content());
-    const auto button = view->buttons().front();
-    button->press();
 }
 
 class Download : public Preview {
@@ -240,43 +221,39 @@ protected:
         screen->beginAppearance(true, false);
         screen->endAppearance();
     }
+    /// Answers the first button below the text.
+    std::shared_ptr<kit::Button> button() const
+    {
+        const auto view = std::dynamic_pointer_cast<PlaceholderView>(screen->screenView()->content());
+        return view->buttons().front();
+    }
+    void pressButton() const
+    {
+        button()->press();
+        drive.dispatch->runUntilIdle();
+    }
     std::optional<Url> far;
 };
 
-TEST_F(Download, BeginsWhenThePersonHasComeToTheDocument)
+TEST_F(Download, BeginsWhenThePersonHasComeAndCanBeStoppedAndBegunAgain)
 {
     putContent();
-    show({*far});
-    drive.dispatch->runUntilIdle();
+    open(*far);
     EXPECT_EQ(screen->content()->kind, Kind::InCloud);
-    EXPECT_THAT(offers(*screen), testing::ElementsAre("Download"));
-
+    EXPECT_EQ(button()->title(), "Download");
     appear();
     EXPECT_TRUE(screen->isDownloading());
     EXPECT_THAT(summary().message, HasSubstr("Downloading"));
-    EXPECT_THAT(offers(*screen), testing::ElementsAre("Cancel"));
-    drive.dispatch->runUntilIdle();
-    EXPECT_FALSE(screen->isDownloading());
-    EXPECT_EQ(screen->content()->text, "Hello");
-}
-
-TEST_F(Download, CanBeStoppedAndBegunAgain)
-{
-    putContent();
-    show({*far});
-    drive.dispatch->runUntilIdle();
-    appear();
-    press(*screen);
-    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(button()->title(), "Cancel");
+    pressButton();
     EXPECT_FALSE(std::filesystem::exists(far->path()));
     EXPECT_THAT(summary().message, HasSubstr("in the cloud"));
     // A notice of a change does not start the download that the user stopped.
-    screen->refreshCurrentPreviewItem();
-    drive.dispatch->runUntilIdle();
+    readAgain();
     EXPECT_FALSE(screen->isDownloading());
-    press(*screen);
-    drive.dispatch->runUntilIdle();
-    EXPECT_EQ(screen->content()->kind, Kind::Text);
+    pressButton();
+    EXPECT_FALSE(screen->isDownloading());
+    EXPECT_EQ(screen->content()->text, "Hello");
 }
 
 TEST_F(Download, SaysWhyItFailedAndTriesAgain)
@@ -286,35 +263,16 @@ TEST_F(Download, SaysWhyItFailedAndTriesAgain)
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(screen->content()->kind, Kind::Failure);
     EXPECT_THAT(summary().message, HasSubstr("could not be downloaded"));
-    EXPECT_THAT(offers(*screen), testing::ElementsAre("Try Again"));
+    EXPECT_EQ(button()->title(), "Try Again");
     putContent();
-    press(*screen);
-    drive.dispatch->runUntilIdle();
-    EXPECT_EQ(screen->content()->text, "Hello");
-}
-
-TEST_F(Download, EndsWhenTheScreenIsLeft)
-{
-    putContent();
-    show({*far});
-    drive.dispatch->runUntilIdle();
-    appear();
-    screen->beginAppearance(false, false);
-    screen->endAppearance();
-    drive.dispatch->runUntilIdle();
-    EXPECT_FALSE(std::filesystem::exists(far->path()));
-    EXPECT_FALSE(screen->content());
-    // The content is read again when the user returns to the screen.
-    appear();
-    drive.dispatch->runUntilIdle();
+    pressButton();
     EXPECT_EQ(screen->content()->text, "Hello");
 }
 
 TEST_F(Download, EndsWhenThePersonGoesBack)
 {
     putContent();
-    show({*far});
-    drive.dispatch->runUntilIdle();
+    open(*far);
     const auto stack = std::make_shared<kit::NavigationController>();
     const auto list = std::make_shared<kit::ViewController>();
     stack->setViewControllers({list, screen}, false);
@@ -328,38 +286,25 @@ TEST_F(Download, EndsWhenThePersonGoesBack)
     EXPECT_FALSE(screen->isDownloading());
     drive.dispatch->runUntilIdle();
     EXPECT_FALSE(std::filesystem::exists(far->path()));
-}
-
-TEST_F(Preview, OffersToOpenElsewhereWhatItCannotShow)
-{
-    show({drive.writeDocument("Data.bin", "bytes")});
+    EXPECT_FALSE(screen->content());
+    // The content is read again when the user returns to the screen.
+    stack->pushViewController(screen, false);
     drive.dispatch->runUntilIdle();
-    EXPECT_TRUE(offers(*screen).empty());
-    std::vector<Url> opened;
-    screen->setOpenInHandler([&](const Url& item, const auto& from) {
-        EXPECT_TRUE(from);
-        opened.push_back(item);
-    });
-    ASSERT_THAT(offers(*screen), testing::ElementsAre("Open in…"));
-    press(*screen);
-    EXPECT_EQ(opened, std::vector<Url>{drive.url("Data.bin")});
+    EXPECT_EQ(screen->content()->text, "Hello");
 }
 
 TEST_F(Preview, KeepsTheViewWhileADocumentIsDamagedForAWhile)
 {
     const auto url = drive.writeDocument("Plan.pdf", testing_support::simplePdf({"one", "two"}));
-    show({url});
-    drive.dispatch->runUntilIdle();
+    open(url);
     const auto view = screen->previewView();
     view->setZoom(3);
     drive.writeDocument("Plan.pdf", "%PDF");
-    screen->refreshCurrentPreviewItem();
-    drive.dispatch->runUntilIdle();
+    readAgain();
     EXPECT_THAT(summary().message, HasSubstr("damaged"));
     EXPECT_TRUE(screen->screenView()->toolbar()->isHidden());
     drive.writeDocument("Plan.pdf", testing_support::simplePdf({"one", "two", "three"}));
-    screen->refreshCurrentPreviewItem();
-    drive.dispatch->runUntilIdle();
+    readAgain();
     EXPECT_EQ(screen->screenView()->content(), view);
     EXPECT_EQ(view->zoom(), 3);
     EXPECT_EQ(screen->screenView()->toolbar()->pageLabel()->text(), "1 of 3");
@@ -367,8 +312,7 @@ TEST_F(Preview, KeepsTheViewWhileADocumentIsDamagedForAWhile)
 
 TEST_F(Preview, SearchesFromItsBar)
 {
-    show({drive.writeDocument("Plan.pdf", testing_support::simplePdf({"hay", "needle"}))});
-    drive.dispatch->runUntilIdle();
+    open(drive.writeDocument("Plan.pdf", testing_support::simplePdf({"hay", "needle"})));
     screen->view()->layoutIfNeeded();
     const auto& bars = *screen->screenView();
     ASSERT_TRUE(bars.toolbar()->findButton()->press());
@@ -406,20 +350,7 @@ TEST(TextDecoding, UnderstandsTheUsualEncodings)
         {"UTF-32 little-endian", "\xFF\xFE\0\0\xFC\0\0\0"sv, TextEnd::Whole, "ü"},
         {"UTF-32 big-endian, no character", "\0\0\xFE\xFF\0\x11\0\0"sv, TextEnd::Whole, "\uFFFD"},
         {"Windows-1252", "\x93q\x94 \x80", TextEnd::Whole, "“q” €"},
-        {"Shift-JIS",
-            "\223\214\213\236\202\251\202\347\213\236\223s\202\334\202\305\220V\212\262\220\374\202\305\223"
-            "\361\216\236\212\324\201B",
-            TextEnd::Whole, "東京から京都まで新幹線で二時間。"},
         {"ISO-2022-JP", "\033$BEl5~$+$i5~ET$^$G!#\033(B", TextEnd::Whole, "東京から京都まで。"},
-        {"GB18030",
-            "\264\323\261\261\276\251\265\275\311\317\272\243\327\370\270\337\314\372\322\252\316\345\270\366"
-            "\320\241\312\261\241\243",
-            TextEnd::Whole, "从北京到上海坐高铁要五个小时。"},
-        {"KOI8-R", "\372\301\315\305\324\313\311 \317 \320\317\305\332\304\313\305", TextEnd::Whole,
-            "Заметки о поездке"},
-        {"Windows-1250",
-            "P\370\355li\232 \236lu\235ou\350k\375 k\371\362 \372p\354l \357\341belsk\351 \363dy.",
-            TextEnd::Whole, "Příliš žluťoučký kůň úpěl ďábelské ódy."},
         {"Windows-1256",
             "\307\341\336\330\307\321 \343\344 \307\341\336\307\345\321\311 \355\323\312\333\321\336 "
             "\323\307\332\312\355\344.",

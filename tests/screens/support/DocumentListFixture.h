@@ -4,36 +4,58 @@
 #pragma once
 
 #include "host/drive/records/ContainerRecord.h"
-#include "kit/views/ListView.h"
 #include "kit/views/ListViewObserver.h"
-#include "tests/screens/support/ComponentsFixture.h"
-
-#include <gmock/gmock.h>
-
-#include <string>
-#include <vector>
+#include "screens/list/DocumentListController.h"
+#include "screens/list/DocumentListControllerDelegate.h"
+#include "tests/screens/support/ScreensFixture.h"
 
 namespace testing_support {
 
-using Lines = std::vector<std::string>;
+/// Records what a folder list reports, one line for each call.
+class RecordingListDelegate : public screens::DocumentListControllerDelegate {
+public:
+    void documentListControllerDidSelectContainerWithViewController(
+        const List& list, const List& container) override;
+    void documentListControllerDidSelectItemAtURL(const List& list, const platform::Url& url) override;
+    void documentListControllerItemsChanged(const List& list) override;
+    void documentListControllerURLWasRemoved(const List& list) override;
+    void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,
+        const platform::Url& url, const std::shared_ptr<kit::View>& view,
+        const Completion& completion) override;
+    void documentListControllerRequestsEditing(const List& list) override;
+    std::shared_ptr<kit::ViewController> documentListControllerViewControllerForPreviewingItemAtURL(
+        const List&, const platform::Url&) override
+    {
+        return preview;
+    }
+
+    Lines take() { return std::exchange(_lines, {}); }
+
+    std::shared_ptr<kit::ViewController> preview; ///< the screen for a peek
+    bool allowsEditing = false;
+
+private:
+    Lines _lines;
+};
 
 /// Lists of folders whose listings the test delivers.
-class DocumentList : public ComponentsFixture {
+class DocumentList : public ScreensFixture {
 protected:
-    platform::Url makePaintLibrary() const
-    {
-        host::drive::ContainerRecord record;
-        record.names = {{"en", "Paint"}};
-        record.iconName = "paint-icon";
-        return drive.makeContainer("com.example.paint", record);
-    }
+    using List = std::shared_ptr<screens::DocumentListController>;
+
+    /// Answers a list of a folder with room for about ten rows, loaded, shown and watched by `delegate`.
+    List shownList(const platform::Url& folder) const;
+    void deliver(const List& list, const HandLister::Entries& entries) const;
+    platform::Url makePaintLibrary() const;
     static HandLister::Entries documents(std::size_t count)
     {
         HandLister::Entries entries;
         for (std::size_t i = 0; i < count; ++i)
-            entries.push_back({"item " + std::to_string(100'000 + i) + ".txt"});
+            entries.push_back({"item " + std::to_string(100'000 + i)});
         return entries;
     }
+
+    std::shared_ptr<RecordingListDelegate> delegate = std::make_shared<RecordingListDelegate>();
 };
 
 /// Records the exact changes that a list's peer is told.

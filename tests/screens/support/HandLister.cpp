@@ -32,17 +32,7 @@ std::shared_ptr<platform::FolderListing> HandLister::list(const Url& folder,
     return listing;
 }
 
-void HandLister::deliver(const Url& folder, const Entries& entries, ListingStage stage) const
-{
-    send(folder, entries, stage, std::nullopt);
-}
-
-void HandLister::fail(const Url& folder, const platform::Error& error) const
-{
-    send(folder, {}, ListingStage::Failed, error);
-}
-
-void HandLister::send(
+void HandLister::deliver(
     const Url& folder, const Entries& entries, ListingStage stage, std::optional<platform::Error> error) const
 {
     std::shared_ptr<Listing> latest;

@@ -29,8 +29,12 @@ public:
     /// Delivers entries to the latest listing of a folder, with its extra items first. Nothing happens when
     /// that listing has ended.
     void deliver(const platform::Url& folder, const Entries& entries,
-        platform::ListingStage stage = platform::ListingStage::Complete) const;
-    void fail(const platform::Url& folder, const platform::Error& error) const;
+        platform::ListingStage stage = platform::ListingStage::Complete,
+        std::optional<platform::Error> error = {}) const;
+    void fail(const platform::Url& folder, const platform::Error& error) const
+    {
+        deliver(folder, {}, platform::ListingStage::Failed, error);
+    }
 
     /// Answers the grouping of the listing that was started last.
     platform::FolderGrouping grouping() const { return _grouping; }
@@ -38,9 +42,6 @@ public:
 
 private:
     struct Listing;
-    void send(const platform::Url& folder, const Entries& entries, platform::ListingStage stage,
-        std::optional<platform::Error> error) const;
-
     std::vector<std::weak_ptr<Listing>> _listings;
     platform::FolderGrouping _grouping = platform::FolderGrouping::FoldersFirst;
 };

@@ -1,12 +1,14 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "tests/screens/support/ComponentsFixture.h"
+#include "tests/screens/support/ScreensFixture.h"
 
-#include "kit/controllers/AlertController.h"
 #include "kit/views/View.h"
 #include "platform/Localization.h"
 #include "screens/DocumentInteractionSheet.h"
+#include "screens/PlaceholderView.h"
+#include "screens/UnavailableScreen.h"
+#include "screens/UpgradeFlow.h"
 
 using namespace platform;
 using namespace screens;
@@ -14,8 +16,6 @@ using namespace testing;
 using namespace testing_support;
 
 namespace {
-
-using Lines = std::vector<std::string>;
 
 struct CountingSheetDelegate : DocumentInteractionSheetDelegate {
     void documentInteractionControllerDidDismissOptionsMenu(
@@ -26,7 +26,7 @@ struct CountingSheetDelegate : DocumentInteractionSheetDelegate {
     int dismissed = 0;
 };
 
-class DocumentInteraction : public ComponentsFixture {
+class Screens : public ScreensFixture {
 protected:
     /// Shows the menu of an item and answers its lines.
     Lines offeredFor(const Url& url)
@@ -36,10 +36,7 @@ protected:
         sheet->presentOptionsMenuFromRectInView(screen, {0, 0, 10, 0}, screen->view(), false);
         return titles();
     }
-    std::shared_ptr<kit::AlertController> alert() const
-    {
-        return std::static_pointer_cast<kit::AlertController>(screen->presentedViewController());
-    }
+    std::shared_ptr<kit::AlertController> alert() const { return alertOver(*screen); }
     Lines titles() const
     {
         Lines found;
@@ -47,24 +44,14 @@ protected:
             found.push_back(action->title());
         return found;
     }
-    void choose(const std::string& title) const
-    {
-        const auto menu = alert();
-        for (const auto& action : menu->actions()) {
-            if (action->title() == title) {
-                menu->press(action);
-                return;
-            }
-        }
-        FAIL() << title;
-    }
+    void choose(const std::string& title) const { pressTitled(alert(), title); }
 
     std::shared_ptr<kit::ViewController> screen = std::make_shared<kit::ViewController>();
     std::shared_ptr<DocumentInteractionSheet> sheet;
     std::shared_ptr<CountingSheetDelegate> told = std::make_shared<CountingSheetDelegate>();
 };
 
-TEST_F(DocumentInteraction, OffersWhatFitsTheItem)
+TEST_F(Screens, OfferWhatFitsTheItem)
 {
     const auto report = drive.writeDocument("Report.pdf"), note = drive.writeDocument("note.txt"),
                folder = drive.makeFolder("Stuff"), far = drive.writePromise("Far.pdf", {});
@@ -89,7 +76,7 @@ TEST_F(DocumentInteraction, OffersWhatFitsTheItem)
     EXPECT_EQ(told->dismissed, 4);
 }
 
-TEST_F(DocumentInteraction, DoesWhatWasChosenOnce)
+TEST_F(Screens, DoWhatWasChosenOnce)
 {
     const auto report = drive.writeDocument("100% & more.pdf");
     for (const auto* title : {"Send by Mail", "Copy Path", "Copy Link", "Show in File Manager", "Print"}) {
@@ -105,7 +92,7 @@ TEST_F(DocumentInteraction, DoesWhatWasChosenOnce)
     EXPECT_EQ(told->dismissed, 5);
 }
 
-TEST_F(DocumentInteraction, OpensInAnyOfManyAppsAndSaysWhenOneDoesNotStart)
+TEST_F(Screens, OpenInAnyOfManyAppsAndSayWhenOneDoesNotStart)
 {
     const auto note = drive.writeDocument("note.txt");
     std::vector<AppHandle> many;
@@ -128,6 +115,40 @@ TEST_F(DocumentInteraction, OpensInAnyOfManyAppsAndSaysWhenOneDoesNotStart)
     choose("Send by Mail");
     ASSERT_TRUE(alert());
     EXPECT_THAT(titles(), ElementsAre("OK"));
+}
+
+TEST_F(Screens, OpenAnOffersPageOnlyWhenAskedTo)
+{
+    UpgradeFlow::initWithOffer(nullptr)->beginWithPresentingViewController(screen);
+    EXPECT_FALSE(alert());
+
+    StorageOffer offer;
+    offer.link.target = "https://example.org/more";
+    const auto flow = UpgradeFlow::initWithOffer(std::make_shared<const StorageOffer>(offer));
+    flow->beginWithPresentingViewController(screen);
+    choose("Cancel");
+    EXPECT_THAT(links->opened, IsEmpty());
+
+    links->answer = Error(FileErrorCode::Unsupported);
+    flow->beginWithPresentingViewController(screen);
+    choose("Open Page");
+    EXPECT_THAT(links->opened, ElementsAre("https://example.org/more"));
+    ASSERT_TRUE(alert());
+    EXPECT_EQ(alert()->title(), "The page cannot be opened");
+}
+
+TEST_F(Screens, TellWhoIsNotSignedInWhatToDo)
+{
+    for (const double width : {360.0, 1024.0}) {
+        const auto view = UnavailableScreen::create()->view();
+        view->setFrame({0, 0, width, 640});
+        view->layoutIfNeeded();
+        const auto& text = view->subviews().front()->frame();
+        EXPECT_GE(text.x, 20);
+        EXPECT_LE(text.maxX(), width - 20);
+        EXPECT_LE(text.width, PlaceholderView::maximumWidth);
+        EXPECT_NEAR(text.midX(), width / 2, 1);
+    }
 }
 
 } // namespace
