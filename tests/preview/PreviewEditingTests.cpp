@@ -54,24 +54,19 @@ protected:
         press(EditTool::NextField);
         ASSERT_TRUE(preview->editor()->fieldBar()->textField()->userEdited(text, {}));
     }
-    void writeAndLeave(const std::string& text)
+    /// Shows the form and writes a text into its first field.
+    void fillIn(const std::string& text)
     {
         show(formPdf());
         edit();
         write(text);
+    }
+    void leave() const
+    {
         navigation->popViewController(false);
         drive.dispatch->runUntilIdle();
     }
-    void answer(const std::string& title)
-    {
-        const auto asked = alert();
-        ASSERT_TRUE(asked);
-        const auto action =
-            std::ranges::find_if(asked->actions(), [&](const auto& each) { return each->title() == title; });
-        ASSERT_NE(action, asked->actions().end()) << title;
-        asked->press(*action);
-        drive.dispatch->runUntilIdle();
-    }
+    void answer(const std::string& title) const { pressTitled(alert(), title); }
     void writeNote(const std::string& text) const
     {
         const auto screen = std::dynamic_pointer_cast<NoteScreen>(alert()->contentViewController());
@@ -194,13 +189,12 @@ TEST_F(PreviewEditingTest, TakesBackMarksAndNotesAndReadsThem)
 
 TEST_F(PreviewEditingTest, LeavingSavesAndNeverReplacesWhatAnotherProgramWrote)
 {
-    writeAndLeave("Ada");
+    fillIn("Ada");
+    leave();
     EXPECT_EQ(written(item), "Ada");
     EXPECT_FALSE(alert());
 
-    show(formPdf());
-    edit();
-    write("Bob");
+    fillIn("Bob");
     const auto theirs = testing_support::simplePdf({"theirs"});
     drive.writeDocument("Form.pdf", theirs);
     preview->refreshCurrentPreviewItem();
@@ -217,12 +211,9 @@ TEST_F(PreviewEditingTest, LeavingSavesAndNeverReplacesWhatAnotherProgramWrote)
 
 TEST_F(PreviewEditingTest, AFailedSaveLosesNothing)
 {
-    show(formPdf());
-    edit();
-    write("Ada");
+    fillIn("Ada");
     ::chmod(item.path().c_str(), 0444);
-    navigation->popViewController(false);
-    drive.dispatch->runUntilIdle();
+    leave();
     EXPECT_EQ(contentOf(item), formPdf());
     ASSERT_TRUE(alert()) << "over the screen that is shown by now";
     EXPECT_THAT(alert()->message(), HasSubstr("permission"));
@@ -234,27 +225,21 @@ TEST_F(PreviewEditingTest, AFailedSaveLosesNothing)
     EXPECT_EQ(written(item), "Ada");
 
     for (const char* choice : {"Keep a Copy", "Discard Changes"}) {
-        show(formPdf());
-        edit();
-        write("Bob");
+        fillIn("Bob");
         fs::remove(item.path());
         press(EditTool::Done);
-        ASSERT_TRUE(alert());
         answer(choice);
         const bool isKept = fs::exists(item.path());
         EXPECT_EQ(isKept, std::string_view(choice) == "Keep a Copy");
         EXPECT_EQ(isKept ? written(item) : "Bob", "Bob");
         navigation->dismissViewController(false);
-        navigation->popViewController(false);
-        drive.dispatch->runUntilIdle();
+        leave();
     }
 }
 
 TEST_F(PreviewEditingTest, FollowsAMoveAndSavesWhereTheProgramIsLeftOrEnds)
 {
-    show(formPdf());
-    edit();
-    write("Ada");
+    fillIn("Ada");
     const auto moved = drive.url("Moved.pdf");
     fs::rename(item.path(), moved.path());
     manager->presentedItemDidMoveToURL(moved);
@@ -262,9 +247,7 @@ TEST_F(PreviewEditingTest, FollowsAMoveAndSavesWhereTheProgramIsLeftOrEnds)
     EXPECT_EQ(written(moved), "Ada");
     EXPECT_FALSE(fs::exists(item.path()));
 
-    show(formPdf());
-    edit();
-    write("Ada");
+    fillIn("Ada");
     drive.notifications->post(Notification::ApplicationWillResignActive);
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(written(item), "Ada");

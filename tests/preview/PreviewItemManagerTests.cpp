@@ -4,7 +4,6 @@
 #include "preview/PreviewItemManager.h"
 
 #include "PreviewFixture.h"
-#include "items/DRItem.h"
 #include "kit/controllers/SearchPresentation.h"
 #include "screens/preview/PreviewContent.h"
 
@@ -47,6 +46,8 @@ TEST_F(Manager, OnlyKeepsAnItemThatIsNotToBeShown)
     EXPECT_FALSE(manager->item());
     EXPECT_FALSE(manager->prepareToPreviewItem(nullptr));
     EXPECT_EQ(drive.log->count("WARNING no preview URL, nothing to show"), 1U);
+    preview->lookwellNewItem(manager);
+    EXPECT_FALSE(preview->currentPreviewItem());
 }
 
 TEST_F(Manager, DismissesASearchBeforeItShowsThePreview)
@@ -59,22 +60,6 @@ TEST_F(Manager, DismissesASearchBeforeItShowsThePreview)
     base->presentViewController(std::make_shared<kit::ViewController>(), false);
     manager->previewItem(document("Second.txt"));
     EXPECT_TRUE(navigation->presentedViewController());
-}
-
-TEST_F(Manager, HasNothingToShowWithoutAnItem)
-{
-    preview->lookwellNewItem(manager);
-    EXPECT_FALSE(preview->arrayOfDocuments());
-    EXPECT_FALSE(preview->currentPreviewItem());
-    manager = nullptr;
-    EXPECT_FALSE(preview->itemManager());
-}
-
-TEST_F(Manager, KnowsPdfDocumentsByTheirNames)
-{
-    EXPECT_TRUE(preview->_lwPreviewItemIsPDFKind(drive.url("Plan.pdf")));
-    for (const auto* name : {"Plan.txt", "Plan", "Plan.unknown", "pdf"})
-        EXPECT_FALSE(preview->_lwPreviewItemIsPDFKind(drive.url(name))) << name;
 }
 
 } // namespace

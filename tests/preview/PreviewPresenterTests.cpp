@@ -23,7 +23,7 @@ namespace {
 class Presenter : public testing_support::PreviewFixture {
 protected:
     /// Previews a document and runs everything that follows.
-    Url preview(const char* name, int mode = PreviewModeQuick)
+    Url open(const char* name, int mode = PreviewModeQuick)
     {
         const auto item = document(name);
         manager->setMode(mode);
@@ -43,13 +43,12 @@ protected:
                     before.st_atim, {before.st_mtim.tv_sec + seconds, before.st_mtim.tv_nsec}};
                 ::utimensat(AT_FDCWD, place.path().c_str(), times, 0);
             }));
+        drive.settle();
     }
-    std::size_t refreshes() const
+    auto refreshes() const
     {
-        std::size_t count = 0;
-        for (const auto& line : drive.log->lines())
-            count += line.starts_with("INFO Refreshing ") ? 1 : 0;
-        return count;
+        return std::ranges::count_if(
+            drive.log->lines(), [](const auto& line) { return line.starts_with("INFO Refreshing "); });
     }
     std::string top() const { return Url::fileURL(drive.layout().defaultContainer()).lastPathComponent(); }
     static constexpr auto reloaded = "DEBUG LWPreviewController: refreshCurrentPreviewItem";
@@ -57,40 +56,35 @@ protected:
 
 TEST_F(Presenter, ReadsOnceForAllChangesOfASecond)
 {
-    const auto url = preview("Notes.txt");
+    const auto url = open("Notes.txt");
     save(url, "first", 10);
-    drive.settle();
     drive.dispatch->advance(0.3);
     save(url, "second", 10);
-    drive.settle();
     EXPECT_TRUE(manager->refreshPending());
     drive.dispatch->advance(0.6);
-    EXPECT_EQ(refreshes(), 0U);
+    EXPECT_EQ(refreshes(), 0);
     drive.dispatch->advance(0.2);
-    EXPECT_EQ(refreshes(), 1U);
+    EXPECT_EQ(refreshes(), 1);
     EXPECT_FALSE(manager->refreshPending());
     drive.dispatch->runUntilIdle();
-    EXPECT_EQ(LookwellItemController::defaultController()->content()->text, "second");
+    EXPECT_EQ(preview->content()->text, "second");
 
     save(url, "third", 10);
-    drive.settle();
     drive.dispatch->advance(1.1);
-    EXPECT_EQ(refreshes(), 2U) << "the next change counts anew";
+    EXPECT_EQ(refreshes(), 2) << "the next change counts anew";
 }
 
 TEST_F(Presenter, ReloadsOnlyNewerContentThatSomebodySees)
 {
-    const auto url = preview("Notes.txt");
-    const auto screen = LookwellItemController::defaultController();
+    const auto url = open("Notes.txt");
     const auto change = [&](int seconds) {
         drive.log->clear();
-        screen->setTitle("Old");
+        preview->setTitle("Old");
         save(url, "changed", seconds);
-        drive.settle();
         drive.dispatch->advance(1.1);
     };
     change(0);
-    EXPECT_EQ(screen->title(), "Notes.txt");
+    EXPECT_EQ(preview->title(), "Notes.txt");
     EXPECT_EQ(drive.log->count(reloaded), 0U) << "the content is as old as it was";
     change(10);
     EXPECT_EQ(drive.log->count(reloaded), 1U);
@@ -99,21 +93,18 @@ TEST_F(Presenter, ReloadsOnlyNewerContentThatSomebodySees)
     navigation->popViewController(false);
     change(40);
     EXPECT_EQ(drive.log->count(reloaded), 0U) << "nobody sees it";
-    EXPECT_EQ(refreshes(), 1U);
+    EXPECT_EQ(refreshes(), 1);
 }
 
 TEST_F(Presenter, BringsTheDetailsUpToDate)
 {
-    const auto url = preview("Notes.txt", PreviewModeDetails);
+    const auto url = open("Notes.txt", PreviewModeDetails);
     EXPECT_THAT(stack(), ElementsAre("-", "i"));
     const auto details = manager->detailsViewController();
     ASSERT_TRUE(details);
-    EXPECT_EQ(details->mode(), PreviewModeDetails);
-    EXPECT_EQ(details->itemManager(), manager);
     const auto before = details->summaryView()->content();
     EXPECT_EQ(before.title, "Notes.txt");
     save(url, std::string(5000, 'x'), 10);
-    drive.settle();
     drive.dispatch->advance(1.1);
     EXPECT_NE(details->summaryView()->content(), before);
 
@@ -126,7 +117,7 @@ TEST_F(Presenter, BringsTheDetailsUpToDate)
 
 TEST_F(Presenter, SaysThatAnItemIsElsewhereThoughNobodyMovedIt)
 {
-    preview("Notes.txt");
+    open("Notes.txt");
     const auto other = document("Other.txt")->url();
     manager->refreshItem(other);
     EXPECT_EQ(manager->item()->url(), other);
@@ -136,17 +127,15 @@ TEST_F(Presenter, SaysThatAnItemIsElsewhereThoughNobodyMovedIt)
     EXPECT_EQ(manager->item()->url(), other) << "what cannot be read changes nothing";
 }
 
-TEST_F(Presenter, FollowsAMove)
+TEST_F(Presenter, FollowsTheFolderThatItsDocumentLiesIn)
 {
-    const auto url = preview("Notes.txt");
-    const auto target = drive.makeFolder("Documents/Trip").appendingPathComponent("Plan.txt");
-    EXPECT_FALSE(FileUtils::moveTo(url, target));
+    open("Documents/Trip/Plan.txt");
+    EXPECT_FALSE(FileUtils::moveTo(drive.url("Documents/Trip"), drive.url("Desktop/Tour")));
     drive.settle();
-    EXPECT_THAT(stack(), ElementsAre(top(), "Documents", "Trip", "*"));
-    EXPECT_EQ(manager->item()->url(), target);
+    EXPECT_THAT(stack(), ElementsAre(top(), "Desktop", "Tour", "*"));
     EXPECT_TRUE(manager->filePresenterRegistered());
 
-    drive.log->clear();
+    const auto target = drive.url("Desktop/Tour/Plan.txt");
     const auto screens = navigation->viewControllers();
     manager->presentedItemDidMoveToURL(target);
     drive.settle();
@@ -154,34 +143,18 @@ TEST_F(Presenter, FollowsAMove)
                   "WARNING UNEXPECTED: duplicate calls to presentedItemDidMoveToURL: " + target.path()),
         1U);
     EXPECT_EQ(navigation->viewControllers(), screens);
-
-    // The folder above is moved with the document in it.
-    EXPECT_FALSE(FileUtils::moveTo(drive.url("Documents/Trip"), drive.url("Desktop/Tour")));
-    drive.settle();
-    EXPECT_THAT(stack(), ElementsAre(top(), "Desktop", "Tour", "*"));
 }
 
 TEST_F(Presenter, ClosesForAnItemThatLeavesTheDrive)
 {
     for (const auto& place : {drive.layout().trash() + "/Notes.txt", drive.folder().at("elsewhere.txt")}) {
-        preview("Notes.txt");
+        open("Notes.txt");
         EXPECT_THAT(stack(), ElementsAre("-", "*"));
         manager->presentedItemDidMoveToURL(Url::fileURL(place));
         EXPECT_FALSE(manager->filePresenterRegistered());
         drive.settle();
         EXPECT_THAT(stack(), ElementsAre("-")) << place;
     }
-}
-
-TEST_F(Presenter, ClosesForAnItemThatIsDeleted)
-{
-    const auto url = preview("Notes.txt");
-    EXPECT_FALSE(FileUtils::remove(url));
-    drive.settle();
-    EXPECT_EQ(drive.log->count("INFO Accommodate deletion: " + logText(url)), 1U);
-    EXPECT_THAT(stack(), ElementsAre("-"));
-    EXPECT_FALSE(manager->filePresenterRegistered());
-    EXPECT_FALSE(manager->batonneActivity());
 }
 
 TEST_F(Presenter, TakesNoOtherScreenAway)
@@ -198,7 +171,7 @@ TEST_F(Presenter, TakesNoOtherScreenAway)
 
 TEST_F(Presenter, LooksAgainWhenPartOfThePackageGoes)
 {
-    const auto url = preview("Notes.txt");
+    const auto url = open("Notes.txt");
     int answers = 0;
     manager->accommodatePresentedSubitemDeletionAtURLCompletionHandler(
         url.appendingPathComponent("part"), [&](const auto& error) {
@@ -206,29 +179,16 @@ TEST_F(Presenter, LooksAgainWhenPartOfThePackageGoes)
             ++answers;
         });
     EXPECT_EQ(answers, 1) << "the writer does not wait";
-    EXPECT_FALSE(manager->filePresenterRegistered());
     drive.dispatch->advance(0.9);
     EXPECT_EQ(drive.log->count(reloaded), 0U);
     drive.dispatch->advance(0.2);
     EXPECT_EQ(drive.log->count(reloaded), 1U);
-    EXPECT_EQ(refreshes(), 1U);
     EXPECT_FALSE(manager->filePresenterRegistered());
-}
-
-TEST_F(Presenter, HearsNothingWhileTheApplicationIsNotActive)
-{
-    const auto url = preview("Notes.txt");
-    drive.notifications->post(Notification::ApplicationWillResignActive);
-    drive.log->clear();
-    save(url, "changed", 10);
-    drive.settle();
-    drive.dispatch->advance(2);
-    EXPECT_THAT(drive.log->lines(), testing::Not(testing::Contains(HasSubstr("presentedItem"))));
 }
 
 TEST_F(Presenter, DoesNothingOnceItIsGone)
 {
-    const auto url = preview("Notes.txt");
+    const auto url = open("Notes.txt");
     manager->presentedItemDidChange();
     manager->presentedItemDidMoveToURL(drive.url("Documents"));
     manager->accommodatePresentedSubitemDeletionAtURLCompletionHandler(url, [](const auto&) {});
@@ -236,13 +196,13 @@ TEST_F(Presenter, DoesNothingOnceItIsGone)
     manager = nullptr;
     drive.settle();
     drive.dispatch->advance(2);
-    EXPECT_EQ(refreshes(), 0U);
+    EXPECT_EQ(refreshes(), 0);
     EXPECT_THAT(stack(), ElementsAre("-", "*"));
 }
 
 TEST_F(Presenter, EndsOnTheMainThreadWhoeverLetsGoLast)
 {
-    preview("Notes.txt");
+    open("Notes.txt");
     const std::weak_ptr handedOver = manager->batonneActivity();
     std::thread([last = std::move(manager)]() mutable { last = nullptr; }).join();
     EXPECT_FALSE(handedOver.expired()) << "not on the other thread";
@@ -252,23 +212,16 @@ TEST_F(Presenter, EndsOnTheMainThreadWhoeverLetsGoLast)
 
 TEST_F(Presenter, HandsTheDocumentOverWhileItIsWatched)
 {
-    const auto url = preview("Notes.txt");
+    const auto url = open("Notes.txt");
     const auto activity = manager->batonneActivity();
     ASSERT_TRUE(activity);
     EXPECT_EQ(activity->type, "BrindleDocsID.viewing");
-    EXPECT_TRUE(activity->isEligibleForHandOff);
-    ASSERT_EQ(activity->userInfo.size(), 1U);
-    const auto* bookmark = find(activity->userInfo, activityKey::documentURL)->get<std::string>();
-    ASSERT_TRUE(bookmark);
-    std::optional<Url> found;
-    drive.cloud->items().decodeBookmark(*bookmark, [&](const Result<Url>& answer) { found = answer.value; });
-    drive.settle();
-    EXPECT_EQ(found, url);
     const std::filesystem::path published(drive.layout().activities());
     EXPECT_FALSE(std::filesystem::is_empty(published));
 
     drive.notifications->post(Notification::ApplicationWillResignActive);
     EXPECT_FALSE(manager->batonneActivity());
+    EXPECT_FALSE(manager->filePresenterRegistered());
     drive.settle();
     EXPECT_TRUE(std::filesystem::is_empty(published));
     drive.notifications->post(Notification::ApplicationDidBecomeActive);
@@ -283,8 +236,6 @@ TEST_F(Presenter, HandsTheDocumentOverWhileItIsWatched)
     drive.settle();
     EXPECT_FALSE(manager->batonneActivity()) << "a bookmark that came too late";
     EXPECT_TRUE(std::filesystem::is_empty(published));
-    manager->registerBatonneActivityForBookmark("");
-    EXPECT_FALSE(manager->batonneActivity());
 }
 
 TEST_F(Presenter, HandsOverNothingThatOthersCannotOpen)
@@ -299,9 +250,9 @@ TEST_F(Presenter, HandsOverNothingThatOthersCannotOpen)
 
 TEST_F(Presenter, DeletesWhenTheUserConfirms)
 {
-    const auto url = preview("Notes.txt");
+    const auto url = open("Notes.txt");
     const auto press = [&](std::size_t action) {
-        LookwellItemController::defaultController()->additionalRightBarButtonItems().front()->press();
+        preview->additionalRightBarButtonItems().front()->press();
         ASSERT_TRUE(alert());
         EXPECT_THAT(alert()->message(), HasSubstr("Notes.txt"));
         EXPECT_TRUE(alert()->press(action));
@@ -313,6 +264,8 @@ TEST_F(Presenter, DeletesWhenTheUserConfirms)
     EXPECT_THAT(stack(), ElementsAre("-"));
     EXPECT_FALSE(alert());
     EXPECT_FALSE(std::filesystem::exists(url.path()));
+    EXPECT_FALSE(manager->filePresenterRegistered());
+    EXPECT_FALSE(manager->batonneActivity());
     EXPECT_THAT(drive.log->activities(),
         testing::IsSupersetOf(
             {"Pressed Delete (LW)", "Delete was Cancelled (itemMgr)", "Delete was Confirmed (itemMgr)"}));
@@ -320,7 +273,7 @@ TEST_F(Presenter, DeletesWhenTheUserConfirms)
 
 TEST_F(Presenter, SaysWhyADocumentCouldNotBeDeleted)
 {
-    const auto url = preview("Notes.txt");
+    const auto url = open("Notes.txt");
     manager->showWarningAndDeleteDocumentBarButton(navigation->topViewController(), nullptr);
     ASSERT_TRUE(alert());
     const auto question = alert();
@@ -335,10 +288,10 @@ TEST_F(Presenter, SaysWhyADocumentCouldNotBeDeleted)
 
 TEST_F(Presenter, MovesToTheChosenFolder)
 {
-    const auto url = preview("Notes.txt");
+    const auto url = open("Notes.txt");
     const auto folder = drive.makeFolder("Documents/Trip");
     const auto choose = [&] {
-        LookwellItemController::defaultController()->additionalRightBarButtonItems().back()->press();
+        preview->additionalRightBarButtonItems().back()->press();
         drive.settle();
         const auto picker =
             std::dynamic_pointer_cast<MoveTargetPicker>(navigation->presentedViewController());
