@@ -10,8 +10,6 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include <limits>
-
 namespace tarrow {
 namespace {
 
@@ -43,6 +41,12 @@ protected:
         platform::installLogSink(nullptr);
     }
 
+    void fetchNow() const
+    {
+        fetcher->fetchNow();
+        dispatch->runUntilIdle();
+    }
+
     std::shared_ptr<RecordingLog> log = RecordingLog::install();
     std::shared_ptr<VirtualDispatch> dispatch = VirtualDispatch::create();
     std::shared_ptr<SimulatedCloud> cloud = std::make_shared<SimulatedCloud>();
@@ -63,20 +67,17 @@ TEST_F(QuotaFetcherTest, FetchesAtOnceAndThenOnSchedule)
     EXPECT_THAT(delegate->values, ElementsAre(1000, 2000));
     dispatch->advance(600);
     EXPECT_THAT(delegate->values, ElementsAre(1000, 2000, 2000, 2000)) << "an unchanged value counts too";
-    EXPECT_EQ(fetcher->freeBytes(), 2000);
-}
 
-TEST_F(QuotaFetcherTest, ASecondScheduleReplacesTheFirst)
-{
-    fetcher->runWithInterval(10.0);
-    dispatch->runUntilIdle();
-    fetcher->runWithInterval(100.0);
-    dispatch->runUntilIdle();
-    EXPECT_EQ(cloud->requests, 2);
-    dispatch->advance(99);
-    EXPECT_EQ(cloud->requests, 2);
-    dispatch->advance(2);
-    EXPECT_EQ(cloud->requests, 3);
+    const Error offline(platform::errorDomain::cloud, 7);
+    cloud->quota = offline;
+    fetchNow();
+    EXPECT_EQ(delegate->values.size(), 4U);
+    EXPECT_EQ(fetcher->freeBytes(), 2000) << "a failed fetch keeps the old value";
+    EXPECT_EQ(log->count("WARNING can't update quota: " + offline.debugDescription()), 1);
+    cloud->quota = std::int64_t{3000};
+    delegate = nullptr;
+    fetchNow();
+    EXPECT_EQ(fetcher->freeBytes(), 3000);
 }
 
 TEST_F(QuotaFetcherTest, WaitsWhileTheApplicationIsInactive)
@@ -98,59 +99,25 @@ TEST_F(QuotaFetcherTest, WaitsWhileTheApplicationIsInactive)
 TEST_F(QuotaFetcherTest, WithoutAnAccountNobodyIsAsked)
 {
     cloud->token = std::nullopt;
-    fetcher->fetchNow();
-    fetcher->fetchNow();
-    dispatch->runUntilIdle();
+    fetchNow();
     EXPECT_EQ(cloud->requests, 0);
     EXPECT_THAT(delegate->values, IsEmpty());
-    EXPECT_EQ(log->count("INFO Not fetching quota. Ubiquity is not enabled"), 2);
+    EXPECT_EQ(log->count("INFO Not fetching quota. Ubiquity is not enabled"), 1);
 }
 
-TEST_F(QuotaFetcherTest, AFailedFetchKeepsTheOldValue)
+TEST_F(QuotaFetcherTest, AnAccountAboveItsLimitHasNothingFree)
 {
-    fetcher->fetchNow();
-    dispatch->runUntilIdle();
-    const Error offline(platform::errorDomain::cloud, 7);
-    cloud->quota = offline;
-    fetcher->fetchNow();
-    dispatch->runUntilIdle();
-    EXPECT_THAT(delegate->values, ElementsAre(1000));
-    EXPECT_EQ(fetcher->freeBytes(), 1000);
-    EXPECT_EQ(log->count("WARNING can't update quota: " + offline.debugDescription()), 1);
-}
-
-TEST_F(QuotaFetcherTest, ValuesAtTheEdges)
-{
-    struct Row {
-        platform::Result<std::int64_t> answer;
-        std::uint64_t expected;
-    };
-    const std::vector<Row> rows{{std::int64_t{0}, 0}, {platform::Result<std::int64_t>{}, 0},
-        {std::int64_t{-5}, 0},
-        {std::numeric_limits<std::int64_t>::max(),
-            static_cast<std::uint64_t>(std::numeric_limits<std::int64_t>::max())}};
-    for (const auto& row : rows) {
-        delegate->values.clear();
-        cloud->quota = row.answer;
-        fetcher->fetchNow();
-        dispatch->runUntilIdle();
-        EXPECT_THAT(delegate->values, ElementsAre(row.expected));
+    for (const auto& answer : {platform::Result<std::int64_t>(), {std::int64_t{-5}}}) {
+        cloud->quota = answer;
+        fetchNow();
     }
-}
-
-TEST_F(QuotaFetcherTest, ADelegateMayBeGone)
-{
-    delegate = nullptr;
-    fetcher->fetchNow();
-    dispatch->runUntilIdle();
-    EXPECT_EQ(fetcher->freeBytes(), 1000);
+    EXPECT_THAT(delegate->values, ElementsAre(0, 0));
 }
 
 TEST_F(QuotaFetcherTest, AnAnswerMayComeAfterTheFetcherHasGone)
 {
     cloud->beforeAnswer = [this] { fetcher = nullptr; };
-    fetcher->fetchNow();
-    dispatch->runUntilIdle();
+    fetchNow();
     EXPECT_EQ(cloud->requests, 1);
     EXPECT_THAT(delegate->values, IsEmpty());
 }
