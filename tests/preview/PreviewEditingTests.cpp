@@ -94,6 +94,7 @@ TEST_F(PreviewEditingTest, OffersItWhereDelegateAndDocumentAllowItAndSaysWhyNotO
     // The content is a PDF document but the name is not one, and the delegate decides by the name.
     show(formPdf(), "Form.ai");
     EXPECT_FALSE(preview->canEdit());
+    EXPECT_FALSE(preview->_lwPreviewItemIsPDFKind(drive.url("Notes.txt")));
 
     show(testing_support::simplePdf({"no index"}), "Damaged.pdf");
     edit();
