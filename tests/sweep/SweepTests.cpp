@@ -13,7 +13,7 @@
 
 namespace {
 
-using sweep_tests::Drive;
+using sweep_tests::Ending;
 using sweep_tests::Fault;
 using sweep_tests::FileCall;
 
@@ -29,16 +29,11 @@ protected:
     }
 };
 
-bool isPart(const Drive& part, const Drive& whole)
-{
-    return std::ranges::includes(whole, part);
-}
-
 TEST_P(Sweep, AKillAtAnyCallLosesNothingAndTheNextStartPutsItRight)
 {
     makeDrive();
     const auto before = seen();
-    const auto whole = run([](const FileCall&) { return Fault{}; });
+    const auto whole = run();
     ASSERT_EQ(whole.status, 0);
     const auto after = seen();
     ASSERT_NE(before, after);
@@ -46,56 +41,41 @@ TEST_P(Sweep, AKillAtAnyCallLosesNothingAndTheNextStartPutsItRight)
     ASSERT_GE(whole.calls, 10);
     RecordProperty("calls", whole.calls);
 
-    for (int point = 1; point <= whole.calls; ++point) {
-        makeDrive();
-        std::string what;
-        const auto ending = run([&](const FileCall& call) {
-            if (call.index != point)
-                return Fault{};
-            what = std::to_string(call.number) + " on " + call.subject;
-            return Fault{Fault::Kind::Kill};
-        });
-        SCOPED_TRACE("killed at call " + std::to_string(point) + ", " + what);
-        if (ending.calls < point) {
+    const auto kill = [](const FileCall&) { return Fault{.isKill = true}; };
+    atEachCall(kill, [&](const FileCall& met, const Ending& ending) {
+        if (met.index == 0) {
             // The index of identifiers follows a change in the background, and the program may end before it
             // does.
             ASSERT_EQ(ending.status, 0);
             EXPECT_TRUE(seen() == after) << differences(seen(), after);
-            continue;
+            return;
         }
         ASSERT_TRUE(ending.wasKilled);
         EXPECT_TRUE(isNothingHalf(seen(), before));
         EXPECT_TRUE(isAllThere(isRemoval() ? after : before));
         startAgain();
         const auto now = seen();
-        const bool isOnTheWay =
-            GetParam().arguments[0] == "mkdir" && isPart(before, now) && isPart(now, after);
+        const bool isOnTheWay = GetParam().arguments[0] == "mkdir" && std::ranges::includes(now, before)
+            && std::ranges::includes(after, now);
         EXPECT_TRUE(now == before || now == after || isOnTheWay) << differences(now, before);
         EXPECT_THAT(leftovers(), isWhatMayBeLeft());
-    }
+    });
 }
 
 TEST_P(Sweep, AFailureOfAnyCallLeavesAllAsItWasOrAllDone)
 {
     makeDrive();
     const auto before = seen();
-    const auto whole = run([](const FileCall&) { return Fault{}; });
+    run();
     const auto after = seen();
     for (const int error : {ENOSPC, EIO, EACCES}) {
-        for (int point = 1; point <= whole.calls; ++point) {
-            makeDrive();
-            FileCall met;
-            const auto ending = run([&](const FileCall& call) {
-                const bool isMet = call.index == point && (error != ENOSPC || call.mayNeedSpace())
-                    && (error != EACCES || call.takesPath());
-                if (isMet)
-                    met = call;
-                return isMet ? Fault{Fault::Kind::Error, error} : Fault{};
-            });
-            if (met.index == 0)
-                continue;
-            SCOPED_TRACE(std::string(::strerrorname_np(error)) + " at call " + std::to_string(point) + ", "
-                + std::to_string(met.number) + " on " + met.subject);
+        SCOPED_TRACE(::strerrorname_np(error));
+        const auto fail = [&](const FileCall& call) {
+            const bool isPossible =
+                (error != ENOSPC || call.mayNeedSpace()) && (error != EACCES || call.takesPath());
+            return isPossible ? Fault{error} : Fault{};
+        };
+        atEachCall(fail, [&](const FileCall& met, const Ending& ending) {
             const auto now = noticed();
             // Once a change is made, only syncing it to the disk can still fail.
             EXPECT_TRUE((now == before && ending.status != 0)
@@ -105,11 +85,11 @@ TEST_P(Sweep, AFailureOfAnyCallLeavesAllAsItWasOrAllDone)
                 startAgain();
             EXPECT_THAT(leftovers(), isWhatMayBeLeft());
             EXPECT_TRUE(noticed() == now) << differences(noticed(), now);
-        }
+        });
     }
 }
 
-INSTANTIATE_TEST_SUITE_P(Operations, Sweep, testing::ValuesIn(sweep_tests::operations()),
-    [](const auto& row) { return std::string(row.param.name); });
+INSTANTIATE_TEST_SUITE_P(
+    Operations, Sweep, testing::ValuesIn(sweep_tests::operations()), testing::PrintToStringParamName());
 
 } // namespace

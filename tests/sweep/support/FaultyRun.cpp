@@ -3,14 +3,16 @@
 
 #include "tests/sweep/support/FaultyRun.h"
 
+#include "host/system/files/FileDescriptor.h"
+
 #include <fcntl.h>
 #include <linux/audit.h>
 #include <linux/filter.h>
 #include <linux/seccomp.h>
 #include <poll.h>
+#include <sched.h>
 #include <sys/ioctl.h>
 #include <sys/prctl.h>
-#include <sys/socket.h>
 #include <sys/syscall.h>
 #include <sys/uio.h>
 #include <sys/wait.h>
@@ -20,74 +22,45 @@
 #include <array>
 #include <cerrno>
 #include <csignal>
-#include <cstring>
-#include <iterator>
+#include <span>
 #include <stdexcept>
 
 namespace sweep_tests {
 
 namespace {
 
-/// Says how a call names its file.
-enum class Form { FolderAndPath, Path, OpenFile };
-
-struct CallKind {
-    int number;
-    Form form;
-    bool mayNeedSpace;
-};
-
-constexpr CallKind kinds[] = {
-    {SYS_openat, Form::FolderAndPath, false},
-    {SYS_openat2, Form::FolderAndPath, false},
-    {SYS_newfstatat, Form::FolderAndPath, false},
-    {SYS_statx, Form::FolderAndPath, false},
-    {SYS_readlinkat, Form::FolderAndPath, false},
-    {SYS_faccessat2, Form::FolderAndPath, false},
-    {SYS_renameat, Form::FolderAndPath, true},
-    {SYS_renameat2, Form::FolderAndPath, true},
-    {SYS_unlinkat, Form::FolderAndPath, false},
-    {SYS_mkdirat, Form::FolderAndPath, true},
-    {SYS_symlinkat, Form::FolderAndPath, true},
-    {SYS_linkat, Form::FolderAndPath, true},
-    {SYS_utimensat, Form::FolderAndPath, false},
-    {SYS_lsetxattr, Form::Path, true},
-    {SYS_fsetxattr, Form::OpenFile, true},
-    {SYS_flistxattr, Form::OpenFile, false},
-    {SYS_fgetxattr, Form::OpenFile, false},
-    {SYS_fchmod, Form::OpenFile, false},
-    {SYS_ftruncate, Form::OpenFile, true},
-    {SYS_fstat, Form::OpenFile, false},
-    {SYS_read, Form::OpenFile, false},
-    {SYS_write, Form::OpenFile, true},
-    {SYS_fsync, Form::OpenFile, true},
-    {SYS_fdatasync, Form::OpenFile, true},
-    {SYS_lseek, Form::OpenFile, false},
-    {SYS_getdents64, Form::OpenFile, false},
+constexpr int namedInFolder[] = {SYS_openat, SYS_openat2, SYS_newfstatat, SYS_statx, SYS_readlinkat,
+    SYS_faccessat2, SYS_renameat, SYS_renameat2, SYS_unlinkat, SYS_mkdirat, SYS_symlinkat, SYS_linkat,
+    SYS_utimensat};
+constexpr int namedByPath[] = {SYS_lsetxattr,
 #ifdef __x86_64__
-    {SYS_open, Form::Path, false},
-    {SYS_mkdir, Form::Path, true},
-    {SYS_rename, Form::Path, true},
-    {SYS_unlink, Form::Path, false},
-    {SYS_rmdir, Form::Path, false},
-    {SYS_lstat, Form::Path, false},
-    {SYS_stat, Form::Path, false},
+    SYS_mkdir, SYS_rename, SYS_unlink, SYS_rmdir
+#endif
+};
+constexpr int ofOpenFile[] = {SYS_fsetxattr, SYS_flistxattr, SYS_fgetxattr, SYS_fchmod, SYS_ftruncate,
+    SYS_fstat, SYS_read, SYS_write, SYS_fsync, SYS_fdatasync, SYS_lseek, SYS_getdents64};
+constexpr std::span<const int> watched[] = {namedInFolder, namedByPath, ofOpenFile};
+constexpr int needingSpace[] = {SYS_renameat, SYS_renameat2, SYS_mkdirat, SYS_symlinkat, SYS_linkat,
+    SYS_lsetxattr, SYS_fsetxattr, SYS_ftruncate, SYS_write, SYS_fsync, SYS_fdatasync,
+#ifdef __x86_64__
+    SYS_mkdir, SYS_rename
 #endif
 };
 
-const CallKind* kindOf(std::uint64_t number)
+bool isAmong(std::span<const int> calls, std::uint64_t number)
 {
-    const auto* found = std::ranges::find(kinds, static_cast<int>(number), &CallKind::number);
-    return found == std::end(kinds) ? nullptr : found;
+    return std::ranges::find(calls, static_cast<int>(number)) != calls.end();
 }
 
 /// Runs in the child: asks the kernel to report the calls, and answers the descriptor that reports them.
 int installFilter()
 {
     std::vector<sock_filter> program{BPF_STMT(BPF_LD | BPF_W | BPF_ABS, offsetof(seccomp_data, nr))};
-    for (const auto& kind : kinds) {
-        program.push_back(BPF_JUMP(BPF_JMP | BPF_JEQ | BPF_K, static_cast<unsigned>(kind.number), 0, 1));
-        program.push_back(BPF_STMT(BPF_RET | BPF_K, SECCOMP_RET_USER_NOTIF));
+    for (const auto& calls : watched) {
+        for (const int call : calls) {
+            program.push_back(BPF_JUMP(BPF_JMP | BPF_JEQ | BPF_K, static_cast<unsigned>(call), 0, 1));
+            program.push_back(BPF_STMT(BPF_RET | BPF_K, SECCOMP_RET_USER_NOTIF));
+        }
     }
     program.push_back(BPF_STMT(BPF_RET | BPF_K, SECCOMP_RET_ALLOW));
     const sock_fprog filter{static_cast<unsigned short>(program.size()), program.data()};
@@ -95,47 +68,6 @@ int installFilter()
         return -1;
     return static_cast<int>(
         ::syscall(SYS_seccomp, SECCOMP_SET_MODE_FILTER, SECCOMP_FILTER_FLAG_NEW_LISTENER, &filter));
-}
-
-union Ancillary {
-    std::array<char, CMSG_SPACE(sizeof(int))> bytes;
-    cmsghdr aligned;
-};
-
-void sendDescriptor(int socket, int descriptor)
-{
-    char nothing = 0;
-    iovec piece{&nothing, 1};
-    Ancillary ancillary{};
-    msghdr message{};
-    message.msg_iov = &piece;
-    message.msg_iovlen = 1;
-    message.msg_control = ancillary.bytes.data();
-    message.msg_controllen = ancillary.bytes.size();
-    auto* header = CMSG_FIRSTHDR(&message);
-    header->cmsg_level = SOL_SOCKET;
-    header->cmsg_type = SCM_RIGHTS;
-    header->cmsg_len = CMSG_LEN(sizeof descriptor);
-    std::memcpy(CMSG_DATA(header), &descriptor, sizeof descriptor);
-    ::sendmsg(socket, &message, 0);
-}
-
-int receiveDescriptor(int socket)
-{
-    char nothing = 0;
-    iovec piece{&nothing, 1};
-    Ancillary ancillary{};
-    msghdr message{};
-    message.msg_iov = &piece;
-    message.msg_iovlen = 1;
-    message.msg_control = ancillary.bytes.data();
-    message.msg_controllen = ancillary.bytes.size();
-    int descriptor = -1;
-    if (::recvmsg(socket, &message, MSG_CMSG_CLOEXEC) == 1) {
-        if (const auto* header = CMSG_FIRSTHDR(&message))
-            std::memcpy(&descriptor, CMSG_DATA(header), sizeof descriptor);
-    }
-    return descriptor;
 }
 
 std::string textAt(pid_t process, std::uint64_t address)
@@ -179,90 +111,66 @@ FileCall describe(const seccomp_notif& notice)
     const auto& arguments = notice.data.args;
     FileCall call;
     call.number = static_cast<std::uint64_t>(notice.data.nr);
-    switch (kindOf(call.number)->form) {
-    case Form::FolderAndPath:
-        call.subject = pathIn(process, arguments[0], textAt(process, arguments[1]));
-        if (call.number == SYS_renameat2)
-            call.newName = pathIn(process, arguments[2], textAt(process, arguments[3]));
-        break;
-    case Form::Path:
-        call.subject = pathIn(process, static_cast<std::uint64_t>(-1), textAt(process, arguments[0]));
-        break;
-    case Form::OpenFile:
+    if (isAmong(ofOpenFile, call.number))
         call.subject = openFile(process, arguments[0]);
-    }
+    else if (isAmong(namedByPath, call.number))
+        call.subject = pathIn(process, static_cast<std::uint64_t>(-1), textAt(process, arguments[0]));
+    else
+        call.subject = pathIn(process, arguments[0], textAt(process, arguments[1]));
+    if (call.number == SYS_renameat2)
+        call.newName = pathIn(process, arguments[2], textAt(process, arguments[3]));
     return call;
 }
 
-class Supervisor {
-public:
-    Supervisor(pid_t process, int listener, std::string folder,
-        const std::function<Fault(const FileCall&)>& faultFor)
-        : _process(process)
-        , _listener(listener)
-        , _folder(std::move(folder))
-        , _faultFor(faultFor)
-    {
-    }
-    Ending run()
-    {
-        pollfd reports{_listener, POLLIN, 0};
-        // The listener reports a hang-up when no process is left.
-        while (::poll(&reports, 1, -1) >= 0 && (reports.revents & POLLIN))
-            answerNext();
-        int status = 0;
-        ::waitpid(_process, &status, 0);
-        _ending.wasKilled = WIFSIGNALED(status);
-        _ending.status = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-        return _ending;
-    }
+void answer(int listener, const seccomp_notif& notice, int errorNumber)
+{
+    seccomp_notif_resp response{};
+    response.id = notice.id;
+    response.error = -errorNumber;
+    response.flags = errorNumber == 0 ? SECCOMP_USER_NOTIF_FLAG_CONTINUE : 0;
+    ::ioctl(listener, SECCOMP_IOCTL_NOTIF_SEND, &response);
+}
 
-private:
-    void answerNext()
-    {
+Ending supervise(pid_t process, int listener, const std::string& folder, const FaultFor& faultFor)
+{
+    Ending ending;
+    pollfd reports{listener, POLLIN, 0};
+    // The listener reports a hang-up when no process is left.
+    while (::poll(&reports, 1, -1) >= 0 && (reports.revents & POLLIN)) {
         seccomp_notif notice{};
-        if (::ioctl(_listener, SECCOMP_IOCTL_NOTIF_RECV, &notice) != 0)
-            return;
+        if (::ioctl(listener, SECCOMP_IOCTL_NOTIF_RECV, &notice) != 0)
+            continue;
         auto call = describe(notice);
         Fault fault;
-        if (call.subject.starts_with(_folder)) {
-            call.index = ++_ending.calls;
-            fault = _faultFor(call);
+        if (call.subject.starts_with(folder)) {
+            call.index = ++ending.calls;
+            fault = faultFor(call);
         }
-        if (fault.kind == Fault::Kind::Kill) {
-            ::kill(_process, SIGKILL);
-            return;
-        }
-        seccomp_notif_resp answer{};
-        answer.id = notice.id;
-        if (fault.kind == Fault::Kind::Error)
-            answer.error = -fault.errorNumber;
+        if (fault.isKill)
+            ::kill(process, SIGKILL);
         else
-            answer.flags = SECCOMP_USER_NOTIF_FLAG_CONTINUE;
-        ::ioctl(_listener, SECCOMP_IOCTL_NOTIF_SEND, &answer);
+            answer(listener, notice, fault.errorNumber);
     }
+    int status = 0;
+    ::waitpid(process, &status, 0);
+    ending.wasKilled = WIFSIGNALED(status);
+    ending.status = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+    return ending;
+}
 
-    pid_t _process;
-    int _listener;
-    std::string _folder;
-    const std::function<Fault(const FileCall&)>& _faultFor;
-    Ending _ending;
-};
-
-[[noreturn]] void becomeProgram(const std::vector<std::string>& command, int socket)
+/// Runs in the child, which shares its open files with this process until it becomes the program: puts the
+/// listener in the place of an open file.
+[[noreturn]] void becomeProgram(const std::vector<std::string>& command, int quiet, int listenersPlace)
 {
     std::vector<char*> arguments;
-    arguments.reserve(command.size() + 1);
     for (const auto& argument : command)
         arguments.push_back(const_cast<char*>(argument.c_str()));
     arguments.push_back(nullptr);
-    const int quiet = ::open("/dev/null", O_WRONLY | O_CLOEXEC);
-    ::dup2(quiet, STDERR_FILENO);
-    ::dup2(quiet, STDOUT_FILENO);
     const int listener = installFilter();
-    sendDescriptor(socket, listener);
-    if (listener >= 0) {
-        ::fcntl(listener, F_SETFD, FD_CLOEXEC);
+    if (::dup3(listener, listenersPlace, O_CLOEXEC) >= 0 && ::close(listener) == 0
+        && ::unshare(CLONE_FILES) == 0) {
+        ::dup2(quiet, STDERR_FILENO);
+        ::dup2(quiet, STDOUT_FILENO);
         ::execv(arguments[0], arguments.data());
     }
     ::_exit(127);
@@ -272,33 +180,27 @@ private:
 
 bool FileCall::mayNeedSpace() const
 {
-    return kindOf(number)->mayNeedSpace;
+    return isAmong(needingSpace, number);
 }
 
 bool FileCall::takesPath() const
 {
-    return kindOf(number)->form != Form::OpenFile;
+    return !isAmong(ofOpenFile, number);
 }
 
-Ending runWithFaults(const std::vector<std::string>& command, const std::string& watchedFolder,
-    const std::function<Fault(const FileCall&)>& faultFor)
+Ending runWithFaults(
+    const std::vector<std::string>& command, const std::string& watchedFolder, const FaultFor& faultFor)
 {
-    int sockets[2];
-    if (::socketpair(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0, sockets) != 0)
-        throw std::runtime_error("no pair of sockets");
-    const auto process = ::fork();
+    const host::system::FileDescriptor quiet(::open("/dev/null", O_WRONLY | O_CLOEXEC));
+    const host::system::FileDescriptor listener(::open("/dev/null", O_WRONLY | O_CLOEXEC));
+    // This process goes on when the child has become the program, and not before.
+    const auto process =
+        static_cast<pid_t>(::syscall(SYS_clone, CLONE_FILES | CLONE_VFORK | SIGCHLD, 0, 0, 0, 0));
     if (process == 0)
-        becomeProgram(command, sockets[1]);
-    ::close(sockets[1]);
-    const int listener = receiveDescriptor(sockets[0]);
-    ::close(sockets[0]);
-    if (listener < 0) {
-        ::waitpid(process, nullptr, 0);
+        becomeProgram(command, quiet.get(), listener.get());
+    if (::waitpid(process, nullptr, WNOHANG) != 0)
         throw std::runtime_error("system calls cannot be filtered here");
-    }
-    const auto ending = Supervisor(process, listener, watchedFolder, faultFor).run();
-    ::close(listener);
-    return ending;
+    return supervise(process, listener.get(), watchedFolder, faultFor);
 }
 
 } // namespace sweep_tests

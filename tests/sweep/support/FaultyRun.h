@@ -20,11 +20,12 @@ struct FileCall {
     bool takesPath() const;
 };
 
-/// The fault that a call meets.
+/// The fault that a call meets, none by default.
 struct Fault {
-    enum class Kind { None, Kill, Error } kind = Kind::None;
     int errorNumber = 0;
+    bool isKill = false;
 };
+using FaultFor = std::function<Fault(const FileCall&)>;
 
 /// How a program ended.
 struct Ending {
@@ -36,7 +37,7 @@ struct Ending {
 /// Runs a program and asks before each of its calls on files below a folder for a fault. A filter of system
 /// calls reports them to this process (as an ordinary user, too). The program and its threads wait meanwhile,
 /// so a kill comes before the call has any effect.
-Ending runWithFaults(const std::vector<std::string>& command, const std::string& watchedFolder,
-    const std::function<Fault(const FileCall&)>& faultFor);
+Ending runWithFaults(
+    const std::vector<std::string>& command, const std::string& watchedFolder, const FaultFor& faultFor);
 
 } // namespace sweep_tests

@@ -28,45 +28,65 @@ void PrintTo(const Operation& operation, std::ostream* stream)
 
 std::vector<Operation> operations()
 {
-    return {{"mkdir", {"mkdir", "new/one/two"}}, {"removeFile", {"remove", "file.txt"}},
-        {"removeFolder", {"remove", "folder"}}, {"removePromise", {"remove", "p.txt"}},
-        {"removeTwin", {"remove", "twin.txt"}}, {"moveFile", {"move", "file.txt", "target/new.txt"}},
+    return {{"mkdir", {"mkdir", "new/one/two"}}, {"removeFile", {"remove", "inner/file.txt"}},
+        {"removeFolder", {"remove", "folder"}}, {"removePromise", {"remove", "inner/p.txt"}},
+        {"removeTwin", {"remove", "inner/twin.txt"}},
+        {"moveFile", {"move", "inner/file.txt", "target/new.txt"}},
         {"moveFolder", {"move", "folder", "target/new"}},
-        {"movePromise", {"move", "p.txt", "target/new.txt"}},
-        {"moveFileAcross", {"move", "file.txt", "target/new.txt"}, FileSystems::Several},
+        {"movePromise", {"move", "inner/p.txt", "target/new.txt"}},
+        {"moveFileAcross", {"move", "inner/file.txt", "target/new.txt"}, FileSystems::Several},
         {"moveFolderAcross", {"move", "folder", "target/new"}, FileSystems::Several},
-        {"movePromiseAcross", {"move", "p.txt", "target/new.txt"}, FileSystems::Several},
-        {"save", {"save", "file.txt", "folder/a.txt"}}, {"evict", {"evict", "file.txt"}},
-        {"fetch", {"fetch", "p.txt"}}};
+        {"movePromiseAcross", {"move", "inner/p.txt", "target/new.txt"}, FileSystems::Several},
+        {"save", {"save", "inner/file.txt", "folder/a.txt"}}, {"evict", {"evict", "inner/file.txt"}},
+        {"fetch", {"fetch", "inner/p.txt"}}};
 }
 
 void SweepFixture::makeDrive() const
 {
     fs::remove_all(_layout.home());
-    for (const auto& folder : {"folder/sub", "folder/empty", "target"})
+    for (const auto& folder : {"inner", "folder/sub", "folder/empty", "target"})
         fs::create_directories(at(folder));
     fs::create_directories(_layout.cloud());
-    write(at("file.txt"), std::string(100'000, 'f'));
+    write(at("inner/file.txt"), std::string(100'000, 'f'));
     write(at("folder/a.txt"), "a");
     write(at("folder/sub/b.txt"), "bb");
     fs::create_symlink("../a.txt", at("folder/sub/link"));
     promise("folder/sub/c.pdf", "ccc");
-    promise("p.txt", "pppp");
-    write(at("twin.txt"), "of the document");
-    promise("twin.txt", "that nobody has seen");
+    promise("inner/p.txt", "pppp");
+    write(at("inner/twin.txt"), "of the document");
+    promise("inner/twin.txt", "that nobody has seen");
     promise("bystander.pdf", "kept");
 }
 
-Ending SweepFixture::run(const std::function<Fault(const FileCall&)>& faultFor) const
+Ending SweepFixture::run(const FaultFor& faultFor) const
 {
     std::vector<std::string> command{TARROW_FILES_COMMAND};
     command.insert(command.end(), GetParam().arguments.begin(), GetParam().arguments.end());
     return runWithFaults(command, _layout.home() + '/', [&](const FileCall& call) {
         const auto fault = faultFor(call);
-        return fault.kind == Fault::Kind::None && isForOtherFileSystem(call)
-            ? Fault{Fault::Kind::Error, EXDEV}
-            : fault;
+        const bool isFaultless = fault.errorNumber == 0 && !fault.isKill;
+        return isFaultless && isForOtherFileSystem(call) ? Fault{EXDEV} : fault;
     });
+}
+
+void SweepFixture::atEachCall(const FaultFor& faultFor,
+    const std::function<void(const FileCall& met, const Ending& ending)>& check) const
+{
+    makeDrive();
+    const int calls = run().calls;
+    for (int point = 1; point <= calls; ++point) {
+        makeDrive();
+        FileCall met;
+        const auto ending = run([&](const FileCall& call) {
+            if (call.index != point)
+                return Fault{};
+            met = call;
+            return faultFor(call);
+        });
+        SCOPED_TRACE(
+            "at call " + std::to_string(point) + ", " + std::to_string(met.number) + " on " + met.subject);
+        check(met, ending);
+    }
 }
 
 void SweepFixture::startAgain() const

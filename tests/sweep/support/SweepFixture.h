@@ -43,8 +43,12 @@ protected:
     void makeDrive() const;
     std::string at(const std::string& path) const { return _layout.defaultContainer() + '/' + path; }
 
-    /// Runs the operation and lets one of its calls meet a fault; none for call 0.
-    Ending run(const std::function<Fault(const FileCall&)>& faultFor) const;
+    /// Runs the operation and lets its calls meet faults.
+    Ending run(const FaultFor& faultFor = [](const FileCall&) { return Fault{}; }) const;
+    /// Runs the operation on a new drive for each of its calls in turn, which meets the fault, and checks
+    /// afterwards. The check is told of call 0 when the operation ended without that call.
+    void atEachCall(const FaultFor& faultFor,
+        const std::function<void(const FileCall& met, const Ending& ending)>& check) const;
     /// Does what every program does when it starts on the drive.
     void startAgain() const;
 
