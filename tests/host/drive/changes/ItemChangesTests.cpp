@@ -13,7 +13,6 @@
 #include <sys/mount.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
-#include <sys/xattr.h>
 
 #include <cerrno>
 
@@ -43,17 +42,6 @@ protected:
         EXPECT_FALSE(held.error);
         return std::move(held.value);
     }
-    static std::string markOf(const std::string& path, const char* name)
-    {
-        char value[64];
-        const auto length = ::getxattr(path.c_str(), name, value, sizeof value);
-        return length < 0 ? std::string() : std::string(value, static_cast<std::size_t>(length));
-    }
-    std::size_t heldCount() const
-    {
-        return static_cast<std::size_t>(
-            std::distance(fs::directory_iterator(layout().held()), fs::directory_iterator()));
-    }
     /// Runs the body in a process of its own that may mount; the test is skipped where that is not allowed.
     /// The body answers the number of the check that failed, 0 for none.
     static void withMounts(const std::function<int()>& body)
@@ -73,24 +61,6 @@ protected:
     }
 };
 
-TEST_F(ItemChangesTest, WhatReplacedTheItemIsKeptAlsoWithItsDateAndSize)
-{
-    const auto url = writeDocument("a.txt", "old");
-    const auto version = changes().versionOfItem(url.path());
-    ASSERT_TRUE(version);
-    const auto date = fs::last_write_time(url.path());
-    writeDocument("other", "new");
-    fs::rename(this->url("other").path(), url.path());
-    fs::last_write_time(url.path(), date);
-    const auto error = changes().removeItem(url.path(), version);
-    ASSERT_TRUE(error);
-    EXPECT_TRUE(error->is(FileErrorCode::Cancelled));
-    EXPECT_EQ(contentOf(url.path()), "new");
-    EXPECT_FALSE(changes().removeItem(url.path(), changes().versionOfItem(url.path())));
-    EXPECT_FALSE(fs::exists(url.path()));
-    EXPECT_EQ(heldCount(), 0U);
-}
-
 TEST_F(ItemChangesTest, RemovesFoldersHoweverDeepTheyLie)
 {
     const auto url = makeFolder("deep");
@@ -105,7 +75,7 @@ TEST_F(ItemChangesTest, RemovesFoldersHoweverDeepTheyLie)
     ::close(folder);
     EXPECT_FALSE(changes().removeItem(url.path(), std::nullopt));
     EXPECT_FALSE(fs::exists(url.path()));
-    EXPECT_EQ(heldCount(), 0U);
+    EXPECT_FALSE(hasTraces());
 }
 
 TEST_F(ItemChangesTest, AHeldItemComesBackUnlessANewerOneTookItsPlace)
@@ -118,7 +88,7 @@ TEST_F(ItemChangesTest, AHeldItemComesBackUnlessANewerOneTookItsPlace)
         EXPECT_FALSE(fs::exists(url.path())) << "it is still being worked on";
     }
     EXPECT_EQ(contentOf(url.path()), "old");
-    EXPECT_EQ(heldCount(), 0U);
+    EXPECT_FALSE(hasTraces());
     {
         const auto held = take(url);
         writeDocument("a.txt", "new");
@@ -129,30 +99,14 @@ TEST_F(ItemChangesTest, AHeldItemComesBackUnlessANewerOneTookItsPlace)
     EXPECT_EQ(contentOf(url.path()), "old") << "both were kept";
 }
 
-TEST_F(ItemChangesTest, TheNextStartPutsBackWhatAKilledProcessHeld)
-{
-    const auto url = writeDocument("Documents/a.txt", "old");
-    const auto child = ::fork();
-    if (child == 0) {
-        const auto held = take(url);
-        ::kill(::getpid(), SIGKILL);
-    }
-    ::waitpid(child, nullptr, 0);
-    EXPECT_FALSE(fs::exists(url.path()));
-    recover();
-    EXPECT_EQ(contentOf(url.path()), "old");
-    EXPECT_EQ(heldCount(), 0U);
-}
-
 TEST_F(ItemChangesTest, MovesToAnotherFileSystemAndBack)
 {
     const auto small = makeFolder("small"), target = small.appendingPathComponent("tree");
     const auto file = writeDocument("tree/sub/a.txt", std::string(100'000, 'x'));
     writeLink("tree/link", "sub/a.txt");
-    const auto big = writeDocument("big", std::string(2'000'000, 'y'));
     const auto tree = url("tree");
     withMounts([&] {
-        if (::mount("tmpfs", small.path().c_str(), "tmpfs", 0, "size=1m") != 0)
+        if (::mount("tmpfs", small.path().c_str(), "tmpfs", 0, "") != 0)
             return 99;
         ::chmod(file.path().c_str(), 0640);
         const auto date = fs::last_write_time(file.path());
@@ -163,23 +117,14 @@ TEST_F(ItemChangesTest, MovesToAnotherFileSystemAndBack)
             || fs::status(moved).permissions() != fs::perms(0640)
             || fs::read_symlink(target.path() + "/link") != "sub/a.txt")
             return 2;
-        const auto full = changes().moveItem(big.path(), small.path() + "/big");
-        if (!full || full->code() != ENOSPC || contentOf(big.path()).size() != 2'000'000)
-            return 3;
-        const auto taken = changes().moveItem(big.path(), target.path());
-        if (!taken || !taken->is(FileErrorCode::ItemExists) || hasTraces())
-            return 4;
         ::mkfifo((target.path() + "/sub/pipe").c_str(), 0600);
         const auto refused = changes().moveItem(target.path(), tree.path());
         if (!refused || refused->code() != EOPNOTSUPP || !fs::exists(moved) || fs::exists(tree.path()))
-            return 5;
+            return 3;
         fs::remove(target.path() + "/sub/pipe");
-        if (changes().moveItem(target.path(), tree.path()) || fs::exists(target.path()) || heldCount() != 0)
-            return 6;
-        if (changes().moveItem(tree.path(), target.path())
-            || changes().removeItem(target.path(), std::nullopt))
-            return 7;
-        return fs::is_empty(small.path()) && !hasTraces() ? 0 : 8;
+        if (changes().moveItem(target.path(), tree.path()))
+            return 4;
+        return fs::is_empty(small.path()) && !hasTraces() ? 0 : 5;
     });
 }
 
@@ -198,20 +143,19 @@ TEST_F(ItemChangesTest, ReplacesAContentAndKeepsWhatBelongsToTheDocument)
     ASSERT_TRUE(after);
     EXPECT_EQ(contentOf(item.path()), "new and longer");
     EXPECT_EQ(changes().versionOfItem(item.path()), *after.value);
-    EXPECT_EQ(markOf(item.path(), host::drive::itemMark::tags), "Work");
-    EXPECT_EQ(markOf(item.path(), host::drive::itemMark::documentIdentifier), "77");
+    EXPECT_THAT(lookAtFile(item.path()).marks.tags, testing::ElementsAre("Work"));
+    EXPECT_EQ(documentIdentifierAt(item.path()), 77U);
     EXPECT_EQ(fs::status(item.path()).permissions(), fs::perms(0640));
 
     const auto copy = url("plan 2.pdf");
     EXPECT_FALSE(changes().addDocument(copy.path(), item.path(), "copy"));
     EXPECT_EQ(contentOf(copy.path()), "copy");
-    EXPECT_EQ(markOf(copy.path(), host::drive::itemMark::tags), "Work");
-    EXPECT_EQ(markOf(copy.path(), host::drive::itemMark::documentIdentifier), "");
+    EXPECT_THAT(lookAtFile(copy.path()).marks.tags, testing::ElementsAre("Work"));
+    EXPECT_EQ(documentIdentifierAt(copy.path()), 0U);
     const auto taken = changes().addDocument(copy.path(), item.path(), "other");
     EXPECT_TRUE(taken && taken->is(FileErrorCode::ItemExists));
     EXPECT_EQ(contentOf(copy.path()), "copy");
     EXPECT_FALSE(hasTraces());
-    EXPECT_EQ(heldCount(), 0U);
 }
 
 TEST_F(ItemChangesTest, RefusesToReplaceWhatIsNotTheContentThatWasRead)
@@ -237,22 +181,6 @@ TEST_F(ItemChangesTest, RefusesToReplaceWhatIsNotTheContentThatWasRead)
     ::chmod(item.path().c_str(), 0444);
     EXPECT_EQ(changes().contentToReplace(item.path(), 100).error->code(), EACCES);
     EXPECT_FALSE(hasTraces());
-    EXPECT_EQ(heldCount(), 0U);
-}
-
-TEST_F(ItemChangesTest, AFullDiskKeepsTheContentThatIsThere)
-{
-    const auto small = makeFolder("small"), item = small.appendingPathComponent("plan.pdf");
-    withMounts([&] {
-        if (::mount("tmpfs", small.path().c_str(), "tmpfs", 0, "size=64k") != 0)
-            return 99;
-        std::ofstream(item.path()) << "old";
-        const auto before = changes().contentToReplace(item.path(), 100);
-        const auto refused = changes().replaceContent(item.path(), *before, std::string(100'000, 'x'));
-        if (!refused.error || refused.error->code() != ENOSPC || contentOf(item.path()) != "old")
-            return 1;
-        return hasTraces() || heldCount() != 0 ? 2 : 0;
-    });
 }
 
 TEST_F(ItemChangesTest, APromiseBesideADocumentGoesOnlyWhenItAddsNothing)
@@ -307,7 +235,7 @@ TEST_F(ItemChangesTest, WhatCannotBePutBackGoesToTheTrash)
     writeDocument("b.txt", "new");
     std::ofstream(layout().trash() + "/b.txt") << "older";
     recover();
-    EXPECT_EQ(heldCount(), 0U);
+    EXPECT_FALSE(hasTraces());
     EXPECT_EQ(contentOf(url("b.txt").path()), "new");
     EXPECT_EQ(contentOf(layout().trash() + "/a.txt"), "old");
     EXPECT_EQ(contentOf(layout().trash() + "/b.txt"), "older");
@@ -346,22 +274,16 @@ TEST_F(ItemChangesTest, NothingChangesOnAReadOnlyDrive)
             || ::mount(nullptr, home.c_str(), nullptr, MS_BIND | MS_REMOUNT | MS_RDONLY, nullptr) != 0)
             return 99;
         const auto removed = changes().removeItem(file.path(), std::nullopt);
-        const auto moved = changes().moveItem(file.path(), url("b.txt").path());
-        const auto made = changes().createFolder(url("folder").path());
-        const auto evicted = changes().evictItem(file.path());
-        int wrong = 1;
-        for (const auto& error : {removed, moved, made, evicted}) {
-            if (!error || error->code() != EROFS)
-                return wrong;
-            ++wrong;
-        }
+        bool isWritten = false, isRead = false;
         const auto refused = fileCoordinator->coordinateWriting(
-            file, platform::WritingOptions::None, [&](const Url&) { wrong = 0; });
-        if (!refused || refused->code() != EROFS || wrong == 0)
-            return 5;
+            file, platform::WritingOptions::None, [&](const Url&) { isWritten = true; });
         fileCoordinator->coordinateReading(
-            file, platform::ReadingOptions::None, [&](const Url&) { wrong = 0; });
-        return wrong == 0 && contentOf(file.path()) == "a" ? 0 : 6;
+            file, platform::ReadingOptions::None, [&](const Url&) { isRead = true; });
+        for (const auto& error : {removed, refused}) {
+            if (!error || error->code() != EROFS)
+                return 1;
+        }
+        return !isWritten && isRead && contentOf(file.path()) == "a" ? 0 : 2;
     });
 }
 

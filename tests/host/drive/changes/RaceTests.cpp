@@ -90,12 +90,6 @@ private:
 
 class RaceTest : public testing::Test, public testing_support::DriveFixture {
 protected:
-    void promiseBeside(const std::string& name) const
-    {
-        PromiseRecord promise;
-        promise.content = "other";
-        writePromise(name, promise);
-    }
     /// Checks that every saved version exists somewhere, was replaced by its saver, or is one of these.
     void expectNoneLost(const Saver& saver, std::set<int> accounted)
     {
@@ -116,7 +110,7 @@ TEST_F(RaceTest, NoVersionIsDeletedThatTheDeleterHadNotSeen)
 {
     constexpr int rounds = 200;
     const auto item = url("a.txt");
-    promiseBeside("a.txt");
+    writeDocument(".a.txt.trwpromise", R"({"content": "other"})");
     Saver saver(item.path(), folder().at("temporary"));
     saver.start();
     std::set<int> deleted;
@@ -166,55 +160,6 @@ TEST_F(RaceTest, NoVersionIsReplacedThatWasNotRead)
     expectNoneLost(saver, accounted);
     EXPECT_GT(replaced, 0);
     EXPECT_GT(saver.saved, 1);
-}
-
-TEST_F(RaceTest, AFolderSwappedForALinkNeverLeadsOutside)
-{
-    constexpr int rounds = 600;
-    const auto outside = folder().at("outside");
-    const auto precious = folder().write("outside/a.txt", "precious");
-    makeFolder("from");
-    const auto target = makeFolder("to");
-    const auto from = url("from").path(), link = url("link").path();
-    fs::create_directory_symlink(outside, link);
-    promiseBeside("from/a.txt");
-    std::atomic<bool> isOver = false;
-    std::atomic<int> swaps = 0;
-    const auto swap = [&] {
-        if (::renameat2(AT_FDCWD, from.c_str(), AT_FDCWD, link.c_str(), RENAME_EXCHANGE) == 0)
-            ++swaps;
-    };
-    std::thread swapping([&] {
-        while (!isOver)
-            swap();
-    });
-    store->inTheWindow = [&] {
-        const int before = swaps;
-        while (swaps == before)
-            std::this_thread::yield();
-    };
-    int done = 0;
-    for (int round = 0; round < rounds; ++round) {
-        const bool isMove = round % 2 == 0;
-        const auto inside = fs::is_symlink(fs::symlink_status(from)) ? link : from;
-        // The write goes into the folder or, when that was swapped just now, to the existing name outside.
-        const FileDescriptor folder(::open(inside.c_str(), O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
-        if (folder) {
-            const FileDescriptor file(::openat(folder.get(), "a.txt", O_WRONLY | O_CREAT | O_CLOEXEC, 0600));
-        }
-        const auto moved = target.path() + "/moved" + std::to_string(round);
-        const auto error =
-            isMove ? changes.moveItem(from + "/a.txt", moved) : changes.removeItem(from + "/a.txt", {});
-        done += error ? 0 : 1;
-        ASSERT_EQ(contentOf(precious), "precious") << "round " << round;
-        changes.moveItem(target.path(), from + "/into");
-        changes.moveItem(from + "/into", target.path());
-    }
-    isOver = true;
-    swapping.join();
-    EXPECT_EQ(std::distance(fs::directory_iterator(outside), fs::directory_iterator()), 1);
-    EXPECT_GT(done, 0);
-    EXPECT_GT(swaps, rounds);
 }
 
 } // namespace

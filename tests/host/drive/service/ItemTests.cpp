@@ -23,10 +23,10 @@ protected:
     {
         constexpr AttributeKey keys[] = {AttributeKey::Name, AttributeKey::LocalizedName,
             AttributeKey::TypeIdentifier, AttributeKey::LocalizedTypeDescription, AttributeKey::FileSize,
-            AttributeKey::ContentModificationDate, AttributeKey::IsDirectory, AttributeKey::IsRegularFile,
-            AttributeKey::IsPackage, AttributeKey::HasHiddenExtension, AttributeKey::ParentDirectoryURL,
-            AttributeKey::IsShared, AttributeKey::SharedItemRole, AttributeKey::DownloadingStatus,
-            AttributeKey::DocumentIdentifier};
+            AttributeKey::CreationDate, AttributeKey::ContentModificationDate, AttributeKey::IsDirectory,
+            AttributeKey::IsRegularFile, AttributeKey::IsPackage, AttributeKey::HasHiddenExtension,
+            AttributeKey::ParentDirectoryURL, AttributeKey::IsShared, AttributeKey::SharedItemRole,
+            AttributeKey::DownloadingStatus, AttributeKey::DocumentIdentifier};
         const auto result = items().promisedItemResourceValues(url, keys);
         EXPECT_TRUE(result) << url.path();
         return result.value.value_or(AttributeMap());
@@ -49,6 +49,9 @@ TEST_F(ItemTests, kindsOfItems)
     _drive.writeDocument(".hidden");
     _drive.writeLink("link.txt", "plain.txt");
     ASSERT_EQ(::mkfifo(_drive.url("pipe.txt").path().c_str(), 0600), 0);
+    _drive.writeDocument(".Promised.trwpromise", R"({"kind": "directory"})");
+    _drive.writeDocument(".Promised.rtfd.trwpromise", R"({"kind": "directory"})");
+    _drive.writeDocument(".Thing.unheardof.trwpromise", R"({"kind": "package"})");
     const struct {
         const char *name, *type;
         bool isDirectory, isPackage, isFile, hasSize;
@@ -60,6 +63,9 @@ TEST_F(ItemTests, kindsOfItems)
         {".hidden", "public.data", false, false, true, true},
         {"link.txt", "public.symlink", false, false, false, true},
         {"pipe.txt", "public.data", false, false, false, false},
+        {"Promised", "public.directory", true, false, false, false},
+        {"Promised.rtfd", "public.rtf-directory", true, true, false, false},
+        {"Thing.unheardof", "public.package", true, true, false, false},
     };
     for (const auto& row : rows) {
         const auto found = values(_drive.url(row.name));
@@ -177,6 +183,80 @@ TEST_F(ItemTests, anUnreadableFolderIsNoMissingItem)
         ASSERT_EQ(::seteuid(0), 0);
     }
     std::filesystem::permissions(locked, std::filesystem::perms::all);
+}
+
+TEST_F(ItemTests, aPromiseIsDescribedWithoutItsContent)
+{
+    PromiseRecord record;
+    record.size = 12'345;
+    record.created = Date{1'600'000'000'123'456'789};
+    record.modified = Date{1'650'000'000'000'000'001};
+    record.type = "public.pdf";
+    record.shared = true;
+    record.role = SharedItemRole::Participant;
+    record.extensionHidden = true;
+    record.documentIdentifier = 4'000'000'000;
+    record.tags = {"Two words", "späte \"Arbeit\" \\ \n", "مهم", "🎂"};
+    const auto url = _drive.writePromise("Plan.pdf", record);
+    EXPECT_FALSE(items().checkPromisedItemIsReachable(url));
+    const auto found = values(url);
+    EXPECT_EQ(found.optional<std::string>(AttributeKey::Name), "Plan.pdf");
+    EXPECT_EQ(found.optional<std::string>(AttributeKey::LocalizedName), "Plan") << "its extension is hidden";
+    EXPECT_EQ(found.optional<std::string>(AttributeKey::TypeIdentifier), "public.pdf");
+    EXPECT_EQ(found.optional<std::uint64_t>(AttributeKey::FileSize), record.size);
+    EXPECT_EQ(found.optional<Date>(AttributeKey::CreationDate), record.created);
+    EXPECT_EQ(found.optional<Date>(AttributeKey::ContentModificationDate), record.modified);
+    EXPECT_EQ(
+        found.optional<DownloadingStatus>(AttributeKey::DownloadingStatus), DownloadingStatus::NotDownloaded);
+    EXPECT_EQ(found.optional<SharedItemRole>(AttributeKey::SharedItemRole), record.role);
+    EXPECT_TRUE(found.flag(AttributeKey::IsShared));
+    EXPECT_EQ(found.optional<std::uint64_t>(AttributeKey::DocumentIdentifier), record.documentIdentifier);
+    EXPECT_EQ(items().readItem(url, {}).tagNames, record.tags);
+    constexpr AttributeKey name[] = {AttributeKey::Name};
+    EXPECT_TRUE(items().resourceValues(url, name).error->is(FileErrorCode::NoSuchItem));
+}
+
+TEST_F(ItemTests, physicalAndLogicalLocations)
+{
+    const auto promised = _drive.writePromise("Notes/Plan.pdf", {});
+    const auto physical = items().physicalURLForPromise(promised);
+    EXPECT_EQ(physical, _drive.url("Notes/.Plan.pdf.trwpromise"));
+    EXPECT_TRUE(items().isItemPromise(physical));
+    EXPECT_EQ(items().logicalURLForPromise(physical), promised);
+
+    const auto here = _drive.writeDocument("here.txt");
+    const auto nothing = _drive.url("nothing.txt");
+    for (const auto& url : {here, nothing}) {
+        EXPECT_TRUE(items().physicalURLForPromise(url).isSameObject(url)) << url.path();
+        EXPECT_FALSE(items().isItemPromise(url)) << url.path();
+        EXPECT_TRUE(items().logicalURLForPromise(url).isSameObject(url)) << url.path();
+    }
+    for (const char* name : {".trwpromise", "..trwpromise", "Plan.pdf.trwpromise", ".gone.trwpromise"})
+        EXPECT_FALSE(items().isItemPromise(_drive.url(name))) << name;
+}
+
+TEST_F(ItemTests, theRealItemCountsWhereBothExist)
+{
+    _drive.writeDocument(".Plan.pdf.trwpromise", R"({"size": 12345, "tags": ["Red"]})");
+    const auto url = _drive.writeDocument("Plan.pdf", "real");
+    EXPECT_TRUE(items().physicalURLForPromise(url).isSameObject(url));
+    const auto found = values(url);
+    EXPECT_EQ(found.optional<std::uint64_t>(AttributeKey::FileSize), 4u);
+    EXPECT_FALSE(found.has(AttributeKey::DownloadingStatus));
+    EXPECT_TRUE(items().readItem(url, {}).tagNames.empty());
+
+    // A broken link is an item as well.
+    const auto link = _drive.writePromise("Link.pdf", {});
+    _drive.writeLink("Link.pdf", "nowhere");
+    EXPECT_EQ(text(link, AttributeKey::TypeIdentifier), "public.symlink");
+}
+
+TEST_F(ItemTests, aNameTooLongForAPromiseIsSimplyMissing)
+{
+    const auto url = _drive.url(std::string(250, 'n'));
+    EXPECT_TRUE(items().checkPromisedItemIsReachable(url)->is(FileErrorCode::NoSuchItem));
+    EXPECT_TRUE(items().physicalURLForPromise(url).isSameObject(url));
+    EXPECT_TRUE(_drive.log->lines().empty());
 }
 
 TEST_F(ItemTests, referencesStandForDocumentsOfContainers)
