@@ -14,15 +14,15 @@
 
 using namespace tarrow;
 using items_tests::ItemsFixture;
-using items_tests::writeFile;
 using namespace testing;
 using testing_support::contentOf;
+using testing_support::writeFile;
 
 namespace {
 
 namespace fs = std::filesystem;
 
-/// Acts at the moment when a presenter of the item is asked to prepare for the change.
+/// Acts at the moment when a presenter of the item is asked to prepare for its deletion.
 class ActingPresenter : public platform::FilePresenter {
 public:
     ActingPresenter(Url url, std::shared_ptr<platform::OperationQueue> queue, std::function<void()> act)
@@ -33,14 +33,11 @@ public:
     }
     std::optional<Url> presentedItemURL() override { return _url; }
     std::shared_ptr<platform::OperationQueue> presentedItemOperationQueue() override { return _queue; }
-    void presentedItemWillMoveToURL(const Url&) override { _act(); }
-    void presentedItemDidMoveToURL(const Url& url) override { movedTo = url; }
     void accommodatePresentedItemDeletionWithCompletionHandler(CompletionHandler completion) override
     {
         _act();
         completion(std::nullopt);
     }
-    std::optional<Url> movedTo;
 
 private:
     Url _url;
@@ -73,19 +70,6 @@ protected:
 MATCHER_P(HasCode, code, "")
 {
     return arg && arg->code() == static_cast<int>(code);
-}
-
-TEST_F(FileChangesTest, MakesAFolderAndThoseOnTheWay)
-{
-    const auto url = at("Documents/a/b/c");
-    log->clear();
-    EXPECT_FALSE(FileUtils::mkdir(url));
-    EXPECT_THAT(log->lines(),
-        ElementsAre("DEBUG Creating directory: '" + url.absoluteString() + "'",
-            "INFO Created directory: '" + url.absoluteString() + "'",
-            StartsWith("DEBUG Coordinated Write returned ")));
-    EXPECT_TRUE(FileUtils::isDir(url));
-    EXPECT_FALSE(FileUtils::mkdir(url)) << "a folder that is there is made";
 }
 
 TEST_F(FileChangesTest, RemovesWhatItWasAskedToAndNothingElse)
@@ -142,65 +126,6 @@ TEST_F(FileChangesTest, KeepsADocumentThatChangedWhileItWasBeingDeleted)
     EXPECT_FALSE(FileUtils::remove(url));
 }
 
-TEST_F(FileChangesTest, MovesAnItemAndTellsItsPresenters)
-{
-    const auto from = makeFolder("from"), to = at("Documents/to");
-    const auto document = writeDocument("from/a.txt", "a");
-    bool wasThere = false;
-    const auto presenter = whenAsked(document, [&] { wasThere = isThere(document); });
-    log->clear();
-    EXPECT_FALSE(FileUtils::moveTo(from, to));
-    EXPECT_THAT(log->lines(),
-        ElementsAre("DEBUG Moving src1:  '" + from.absoluteString() + "'",
-            "DEBUG Moving dest1: '" + to.absoluteString() + "'",
-            "DEBUG Moving src2:  '" + from.absoluteString() + "'",
-            "DEBUG Moving dest2: '" + to.absoluteString() + "'", "INFO Move successful"));
-    dispatch->runUntilIdle();
-    EXPECT_TRUE(wasThere);
-    EXPECT_EQ(presenter->movedTo, at("Documents/to/a.txt"));
-    EXPECT_EQ(contentOf(at("Documents/to/a.txt")), "a");
-    EXPECT_FALSE(isThere(from));
-}
-
-TEST_F(FileChangesTest, MovesAPromiseAsAPromise)
-{
-    host::drive::PromiseRecord promise;
-    promise.size = 77;
-    promise.documentIdentifier = 5;
-    promise.tags = {"Red"};
-    const auto from = writePromise("a.pdf", promise), to = at("Documents/b.pdf");
-    log->clear();
-    EXPECT_FALSE(FileUtils::moveTo(from, to));
-    EXPECT_EQ(log->count("INFO Move: source filename does not exist, must be a fault."), 1U);
-    EXPECT_FALSE(isThere(promiseOf(from)));
-    EXPECT_FALSE(isThere(to));
-    EXPECT_EQ(
-        FileUtils::getResourceValueForURL(AttributeKey::FileSize, to), AttributeValue(std::uint64_t{77}));
-    EXPECT_EQ(DriveFixture::cloud->promisedItems().readItem(to, {}).tagNames, promise.tags);
-}
-
-TEST_F(FileChangesTest, AFolderSwappedForALinkLeadsNowhere)
-{
-    const auto kept = outside("a.txt");
-    const auto swap = [&](const Url& folder) {
-        fs::rename(folder.path(), folder.path() + ".away");
-        fs::create_directory_symlink(kept.deletingLastPathComponent().path(), folder.path());
-    };
-    const auto document = writeDocument("from/a.txt", "a"), free = writeDocument("b.txt", "b");
-    const auto target = makeFolder("to");
-    // The outside file has the same date, so that only the link is in the way.
-    fs::last_write_time(kept.path(), fs::last_write_time(document.path()));
-
-    const auto mover = whenAsked(free, [&] { swap(target); });
-    EXPECT_THAT(FileUtils::moveTo(free, target.appendingPathComponent("b.txt")), HasCode(ENOTDIR));
-    const auto remover = whenAsked(document, [&] { swap(at("from")); });
-    EXPECT_TRUE(FileUtils::remove(document));
-    EXPECT_EQ(contentOf(kept), "precious");
-    EXPECT_FALSE(fs::exists(folder().at("outside/b.txt")));
-    EXPECT_EQ(contentOf(at("from.away/a.txt")), "a");
-    EXPECT_EQ(contentOf(free), "b");
-}
-
 /// Answers everything below a folder by its path, with its content or target.
 std::map<std::string, std::string> everything(const std::string& folder)
 {
@@ -235,6 +160,7 @@ TEST_F(FileChangesTest, WhatCannotBeDoneIsToldAndChangesNothing)
     const auto before = everything(layout().documents());
     EXPECT_FALSE(FileUtils::moveTo(file, file));
     EXPECT_EQ(log->count("DEBUG Move: src and dest are the same"), 1U);
+    EXPECT_FALSE(FileUtils::mkdir(dir)) << "a folder that is there is made";
     const Row rows[] = {
         {"256 bytes", FileUtils::mkdir(at(composed)), 514},
         {"384 bytes of as many letters", FileUtils::moveTo(file, at(decomposed)), 514},

@@ -2,7 +2,6 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "items/FileUtils.h"
-#include "platform/TypeRegistry.h"
 #include "tests/items/support/ItemsFixture.h"
 
 using namespace tarrow;
@@ -12,24 +11,6 @@ using testing::ElementsAre;
 namespace {
 
 class FileUtilsTest : public ItemsFixture { };
-
-TEST_F(FileUtilsTest, TellsFilesFromFolders)
-{
-    const auto file = writeDocument("Notes/a.txt", "1");
-    std::filesystem::create_symlink("Notes", at("link").path());
-    std::filesystem::create_symlink("gone", at("dangling").path());
-    struct Row {
-        const char* name;
-        bool exists, isFile, isDir;
-    };
-    for (const auto& row : {Row{"Notes/a.txt", true, true, false}, Row{"Notes", true, false, true},
-             Row{"link", true, false, true}, Row{"dangling", false, false, false},
-             Row{"gone", false, false, false}}) {
-        EXPECT_EQ(FileUtils::exists(at(row.name)), row.exists) << row.name;
-        EXPECT_EQ(FileUtils::isFile(at(row.name)), row.isFile) << row.name;
-        EXPECT_EQ(FileUtils::isDir(at(row.name)), row.isDir) << row.name;
-    }
-}
 
 TEST_F(FileUtilsTest, PrefersThePromisedValueOfAnAttribute)
 {
@@ -45,36 +26,6 @@ TEST_F(FileUtilsTest, PrefersThePromisedValueOfAnAttribute)
     changeValues([](const Url&, AttributeMap& values) { values.set(AttributeKey::FileSize, {}); });
     EXPECT_EQ(
         FileUtils::getResourceValueForURL(AttributeKey::FileSize, local), AttributeValue(std::uint64_t{2}));
-}
-
-TEST_F(FileUtilsTest, LogsAFilesAttributes)
-{
-    FileUtils::logFileAttributes(writeDocument("a.txt", "12345").path());
-    EXPECT_THAT(log->lines(),
-        ElementsAre(testing::MatchesRegex("DEBUG Date Created: .* \\(-?[0-9.]+ seconds ago\\)"),
-            testing::MatchesRegex("DEBUG Date Modified: .* \\(-?[0-9.]+ seconds ago\\)"),
-            "DEBUG Size: 5 bytes"));
-    log->clear();
-    const auto path = at("gone").path();
-    FileUtils::logFileAttributes(path);
-    EXPECT_THAT(
-        log->lines(), ElementsAre(testing::StartsWith("ERROR Cannot get attributes of " + path + ": ")));
-}
-
-TEST_F(FileUtilsTest, CountsPicturesFilmsSoundsAndPdfAsMedia)
-{
-    const auto isMedia = [&](const char* name) { return FileUtils::isAudioVideoImageFile(at(name)); };
-    for (const char* name : {"a.png", "a.PNG", "a.mp4", "a.mp3", "a.pdf"})
-        EXPECT_TRUE(isMedia(name)) << name;
-    for (const char* name : {"a.txt", "a", "a.zip"})
-        EXPECT_FALSE(isMedia(name)) << name;
-    EXPECT_EQ(log->count("DEBUG isAudioVideoImageFile: Extension txt is "
-                  + FileUtils::fileUTI(at("a.txt")).value_or("") + " which is not."),
-        1U);
-    EXPECT_EQ(log->count("DEBUG isAudioVideoImageFile: Extension pdf is public.pdf which conforms to UTI "
-                         "public.pdf"),
-        1U);
-    EXPECT_EQ(FileUtils::fileUTI(at("a")), std::nullopt);
 }
 
 TEST_F(FileUtilsTest, AsksTheContainerForTheTypesItTakes)
@@ -148,27 +99,6 @@ protected:
     std::optional<std::vector<std::string>> components;
 };
 
-TEST_F(LocationTest, SplitsALocationIntoContainerAndNames)
-{
-    writePromise("Notes/Old/a.txt", {});
-    EXPECT_FALSE(split(at("Notes/Old/a.txt")));
-    EXPECT_EQ(container->identifier, "BrindleDefault");
-    EXPECT_THAT(*components, ElementsAre("Notes", "Old", "a.txt"));
-
-    items_tests::writeFile(sketch("a.txt").path(), "1");
-    EXPECT_FALSE(split(sketch("a.txt")));
-    EXPECT_EQ(container->identifier, "sketches");
-    EXPECT_THAT(*components, ElementsAre("a.txt"));
-
-    // A missing item takes its name from its path.
-    EXPECT_FALSE(split(at("gone.txt")));
-    EXPECT_THAT(*components, ElementsAre("gone.txt"));
-    EXPECT_FALSE(split(root()));
-    EXPECT_EQ(components, std::nullopt);
-    EXPECT_FALSE(FileUtils::containerAndRelativePathforURLContainerRelativePathComponents(
-        sketch("a.txt"), nullptr, nullptr));
-}
-
 TEST_F(LocationTest, SaysWhyALocationCannotBeSplit)
 {
     EXPECT_TRUE(split(Url::fileURL("/outside/a.txt")));
@@ -185,7 +115,7 @@ TEST_F(LocationTest, SaysWhyALocationCannotBeSplit)
 TEST_F(LocationTest, SplitsBesideTheErrorOfADamagedContainer)
 {
     describeContainer("sketches", "damaged");
-    items_tests::writeFile(sketch("a.txt").path(), "1");
+    testing_support::writeFile(sketch("a.txt").path(), "1");
     EXPECT_TRUE(split(sketch("a.txt")));
     ASSERT_TRUE(container);
     EXPECT_THAT(*components, ElementsAre("a.txt"));
@@ -194,8 +124,8 @@ TEST_F(LocationTest, SplitsBesideTheErrorOfADamagedContainer)
 
 TEST_F(LocationTest, WritesTheLocationLineInBothDirections)
 {
-    items_tests::writeFile(at("Notes/Old/a.txt").path(), "1");
-    items_tests::writeFile(sketch("Pens/b.txt").path(), "1");
+    testing_support::writeFile(at("Notes/Old/a.txt").path(), "1");
+    testing_support::writeFile(sketch("Pens/b.txt").path(), "1");
     const auto drive = isolated("My Drive"), library = isolated("Sketchbook");
     for (const bool isRightToLeft : {false, true}) {
         texts->rightToLeft = isRightToLeft;
@@ -204,6 +134,9 @@ TEST_F(LocationTest, WritesTheLocationLineInBothDirections)
         EXPECT_EQ(FileUtils::displayableLocationForURL(at("Notes")), mark + drive);
         EXPECT_EQ(FileUtils::displayableLocationForURL(at("Notes/Old/a.txt")),
             mark + drive + arrow + isolated("Notes") + arrow + isolated("Old"));
+        EXPECT_EQ(
+            FileUtils::displayableLocationForURL(at("Gone/a.txt")), mark + drive + arrow + isolated("Gone"))
+            << "a missing item has the names of its path";
         EXPECT_EQ(FileUtils::displayableLocationForURL(sketch("Pens/b.txt")),
             mark + drive + arrow + library + arrow + isolated("Pens"));
     }

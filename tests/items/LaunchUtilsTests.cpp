@@ -64,7 +64,7 @@ TEST_F(LaunchUtilsTest, WhatThePreviewShowsWellStaysInTheDefaultContainer)
     apps->known = {painter};
     for (const auto* name : {"a.pdf", "a.jpeg", "a.mov", "a.mp3"}) {
         EXPECT_EQ(appFor(writeDocument(name)), "") << name;
-        EXPECT_EQ(appFor(items_tests::writeFile(library.path() + '/' + name, "1")), "painter") << name;
+        EXPECT_EQ(appFor(testing_support::writeFile(library.path() + '/' + name, "1")), "painter") << name;
     }
     EXPECT_EQ(appFor(writeReference("pointer.txt.trwref", "box", "a.pdf")), "")
         << "what a reference leads to is judged";

@@ -83,7 +83,7 @@ TEST_F(MenuEnableChecksTest, TheFolderLevelsOfAContainerAreKept)
         const auto top = library("box", row.levels);
         const auto folder = top.appendingPathComponent("Folder"), file = top.appendingPathComponent("a.txt");
         std::filesystem::create_directories(folder.path() + "/Deeper");
-        items_tests::writeFile(file.path(), "1");
+        testing_support::writeFile(file.path(), "1");
         log->clear();
         EXPECT_EQ(MenuEnableChecks::canEnableNewFolderForSelectedItems(*shown(top)), row.newFolderAtTop);
         EXPECT_EQ(log->count(row.topLine), 1U) << row.levels;
@@ -106,7 +106,7 @@ TEST_F(MenuEnableChecksTest, TheFolderLevelsOfAContainerAreKept)
 TEST_F(MenuEnableChecksTest, WithoutAContainerNothingIsOffered)
 {
     const auto outside = Url::fileURL(folder().at("outside"));
-    const auto file = items_tests::writeFile(outside.path() + "/a.txt", "1");
+    const auto file = testing_support::writeFile(outside.path() + "/a.txt", "1");
     std::filesystem::create_directories(outside.path() + "/Folder");
     const auto list = shown(outside, {outside.appendingPathComponent("Folder")});
     log->clear();
@@ -121,16 +121,16 @@ TEST_F(MenuEnableChecksTest, WithoutAContainerNothingIsOffered)
 TEST_F(MenuEnableChecksTest, OnlyFoldersThatAreShownTakeMovedItems)
 {
     const auto top = library("box", "any");
-    const auto file = items_tests::writeFile(top.path() + "/a.txt", "1");
+    const auto file = testing_support::writeFile(top.path() + "/a.txt", "1");
     for (const auto* name : {"/.hidden", "/Book.textbundle"})
         std::filesystem::create_directories(top.path() + name);
     std::filesystem::create_directory_symlink(top.path() + "/.hidden", top.path() + "/link");
-    items_tests::writeFile(top.path() + "/.b.txt.trwpromise", host::drive::PromiseRecord{}.toJson());
+    testing_support::writeFile(top.path() + "/.b.txt.trwpromise", host::drive::PromiseRecord{}.toJson());
     EXPECT_FALSE(MenuEnableChecks::containerHasSubfolders(file));
 
     host::drive::PromiseRecord promised;
     promised.kind = host::drive::PromiseRecord::Kind::Directory;
-    items_tests::writeFile(top.path() + "/.Far.trwpromise", promised.toJson());
+    testing_support::writeFile(top.path() + "/.Far.trwpromise", promised.toJson());
     EXPECT_TRUE(MenuEnableChecks::containerHasSubfolders(file)) << "a promised folder";
     std::filesystem::remove(top.path() + "/.Far.trwpromise");
     std::filesystem::create_directory(top.path() + "/Folder");

@@ -54,18 +54,6 @@ TEST_F(RecordTest, ReadsAPromiseFromWhatIsPromised)
             + ", ResURL=<same>, PromiseURL=" + item->promiseURL()->absoluteString() + ", Promise, ");
 }
 
-TEST_F(RecordTest, ReadsALocalFile)
-{
-    const auto url = writeDocument("a file.txt", "12345");
-    const auto item = DRItem::initWithURL(url);
-    ASSERT_TRUE(item);
-    EXPECT_FALSE(item->localizedTypeDescription().empty());
-    EXPECT_TRUE(item->promiseURL()->isSameObject(*item->resolvedURL()));
-    EXPECT_EQ(item->description(),
-        "Name=a file.txt, Size=5, URL=" + url.absoluteString()
-            + ", ResURL=<same>, PromiseURL=<same>, Local,");
-}
-
 TEST_F(RecordTest, BelievesOnlyAKnownDownloadingStatus)
 {
     const auto url = writeDocument("a.txt", "1");
@@ -127,22 +115,6 @@ TEST_F(RecordTest, ShowsAContainerUnderItsOwnName)
     EXPECT_THAT(damaged->localizedName(), testing::Not(IsEmpty()));
 }
 
-TEST_F(RecordTest, FollowsALinkToItsEnd)
-{
-    const auto target = writeDocument("Notes/target.txt", "1");
-    for (const auto& destination : {std::string("target.txt"), target.path()}) {
-        const auto link = at("Notes/link");
-        std::filesystem::remove(link.path());
-        std::filesystem::create_symlink(destination, link.path());
-        const auto item = DRItem::initWithURL(link);
-        ASSERT_TRUE(item) << destination;
-        EXPECT_TRUE(item->isSymlink());
-        EXPECT_EQ(item->localizedName(), "link");
-        EXPECT_EQ(item->resolvedURL(), target);
-        EXPECT_THAT(item->description(), testing::EndsWith("Symlink, "));
-    }
-}
-
 TEST_F(RecordTest, FollowsAnAliasWhateverTheCaseOfItsKind)
 {
     const auto target = writeDocument("Notes/target.txt", "1");
@@ -168,16 +140,6 @@ TEST_F(RecordTest, KeepsAnAliasToNowhereWithoutATarget)
     EXPECT_FALSE(item->canPreview());
     EXPECT_FALSE(item->thumbnail());
     EXPECT_THAT(log->lines(), testing::Contains(testing::StartsWith("WARNING Error resolving Alias: ")));
-}
-
-TEST_F(RecordTest, WarnsThatAPromisedAliasIsNotFollowed)
-{
-    const auto url = writePromise("pointer.trwalias", promise(100));
-    EXPECT_TRUE(DRItem::initWithURL(url)->isSymlink());
-    EXPECT_EQ(log->count("WARNING Pathwell Alias is promised -- unable to determine target without "
-                         "downloading: "
-                  + url.absoluteString()),
-        1U);
 }
 
 TEST_F(RecordTest, ReadsTheDocumentThatAReferenceStandsFor)
@@ -230,15 +192,6 @@ TEST_F(RecordTest, IsNotBuiltForWhatIsNotThereOrWithoutAUrl)
     EXPECT_EQ(log->count("ERROR Failed to cache values for URL " + at("gone.txt").absoluteString()), 1U);
     EXPECT_THAT(
         [] { DRItem::init(); }, testing::ThrowsMessage<std::invalid_argument>("Don't call -[DRItem init]."));
-}
-
-TEST_F(RecordTest, FormatsDatesWithTheShortTime)
-{
-    const auto item = DRItem::initWithURL(writePromise("a.txt", promise(1)));
-    EXPECT_EQ(item->friendlyCreationDate(DateStyle::Long),
-        services().formatters().date(*item->creationDate(), DateStyle::Long, DateStyle::Short));
-    item->setContentModificationDate(std::nullopt);
-    EXPECT_EQ(item->friendlyContentModificationDate(DateStyle::Long), std::nullopt);
 }
 
 class RecordFaultTest : public ItemsFixture {
@@ -316,22 +269,10 @@ TEST_F(RecordFaultTest, ReadsPlainAttributesWhereTheRecordIsDamaged)
     EXPECT_THAT(fallback->typeIdentifier(), IsEmpty());
 }
 
-TEST_F(RecordFaultTest, DoesNotTryPlainAttributesOfAMissingItem)
-{
-    const auto url = writeDocument("a.txt", "12345");
-    decorated->decoratedItems.changePromised = [](const Url&, Result<AttributeMap>& values) {
-        values = Error(FileErrorCode::NoSuchItem);
-    };
-    const auto item = DRItem::initWithURL(url);
-    ASSERT_TRUE(item);
-    EXPECT_THAT(item->typeIdentifier(), IsEmpty());
-    EXPECT_THAT(log->lines(), testing::Not(testing::Contains(testing::HasSubstr("ResourceValues"))));
-}
-
 TEST_F(RecordFaultTest, HasNoRecordOfADamagedPromise)
 {
     const auto url = at("lost.txt");
-    items_tests::writeFile(host::drive::PromiseRecord::pathFor(url.path()), "{ no promise");
+    testing_support::writeFile(host::drive::PromiseRecord::pathFor(url.path()), "{ no promise");
     EXPECT_FALSE(DRItem::initWithURL(url));
     EXPECT_EQ(log->count("WARNING promisedItemResourceValuesForKeys failed on " + url.absoluteString()), 1U);
 }

@@ -2,7 +2,6 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "items/DocumentID.h"
-#include "items/FileUtils.h"
 #include "items/UrlResolution.h"
 #include "tests/items/support/ItemsFixture.h"
 
@@ -12,16 +11,6 @@ using items_tests::ItemsFixture;
 namespace {
 
 class UrlResolutionTest : public ItemsFixture { };
-
-TEST_F(UrlResolutionTest, LeavesAPlainLocationAsItIs)
-{
-    for (const auto& url :
-        {writeDocument("a.txt", "1"), items_tests::writeFile(at("damaged.trwref").path(), "no reference")}) {
-        EXPECT_TRUE(trw_URLByResolvingBookmark(url)->isSameObject(url));
-        EXPECT_TRUE(trw_URLByResolvingPromise(url).isSameObject(url));
-        EXPECT_TRUE(trw_URLByResolvingAlias(url).isSameObject(url));
-    }
-}
 
 TEST_F(UrlResolutionTest, FollowsAReferenceToThePlaceWhereItsDocumentShows)
 {
@@ -71,25 +60,13 @@ protected:
     }
 };
 
-TEST_F(DocumentIdentifierTest, FollowsADocumentThatMoves)
+TEST_F(DocumentIdentifierTest, IsTheNumberAtTheStartOfAText)
 {
     const auto url = writeDocument("a.txt", "1");
     EXPECT_EQ(trw_DocumentID(url), 0) << "it is read, not given";
     const auto identifier = identify(url);
     EXPECT_EQ(std::to_string(trw_DocumentID(url)), identifier);
-    EXPECT_EQ(trw_URLFromDocumentID(identifier), url);
     EXPECT_EQ(trw_URLFromDocumentID(" \t" + identifier + " and more"), url);
-
-    makeFolder("Notes");
-    ASSERT_EQ(FileUtils::moveTo(url, at("Notes/renamed.txt")), std::nullopt);
-    writeDocument("a.txt", "another");
-    EXPECT_EQ(trw_URLFromDocumentID(identifier), at("Notes/renamed.txt"));
-    EXPECT_EQ(log->count("ERROR"), 0U);
-    ASSERT_TRUE(FileUtils::evictDocument(at("Notes/renamed.txt")));
-    EXPECT_EQ(trw_URLFromDocumentID(identifier), at("Notes/renamed.txt"));
-    EXPECT_EQ(std::to_string(trw_DocumentID(at("Notes/renamed.txt"))), identifier);
-    ASSERT_EQ(FileUtils::remove(at("Notes/renamed.txt")), std::nullopt);
-    EXPECT_EQ(trw_URLFromDocumentID(identifier), std::nullopt);
 }
 
 TEST_F(DocumentIdentifierTest, FindsNothingWhileSignedOut)

@@ -35,15 +35,6 @@ namespace {
 using host::drive::DriveLayout;
 using platform::Url;
 
-void writeFile(const std::string& path, std::string_view content)
-{
-    std::filesystem::create_directories(std::filesystem::path(path).parent_path());
-    std::ofstream file(path, std::ios::binary | std::ios::trunc);
-    file.write(content.data(), static_cast<std::streamsize>(content.size()));
-    if (!file.flush())
-        throw std::runtime_error("cannot write " + path);
-}
-
 const std::shared_ptr<host::system::MimeTypeRegistry>& types()
 {
     // The process has one registry, because it reads the system's type database and answers from memory.
@@ -64,6 +55,16 @@ std::string contentOf(const std::string& path)
 {
     std::ifstream file(path, std::ios::binary);
     return {std::istreambuf_iterator<char>(file), {}};
+}
+
+Url writeFile(const std::string& path, std::string_view content)
+{
+    std::filesystem::create_directories(std::filesystem::path(path).parent_path());
+    std::ofstream file(path, std::ios::binary | std::ios::trunc);
+    file.write(content.data(), static_cast<std::streamsize>(content.size()));
+    if (!file.flush())
+        throw std::runtime_error("cannot write " + path);
+    return Url::fileURL(path);
 }
 
 DriveFixture::DriveFixture()
@@ -125,9 +126,7 @@ Url DriveFixture::url(std::string_view relativePath) const
 
 Url DriveFixture::writeDocument(std::string_view relativePath, std::string_view content) const
 {
-    const auto location = url(relativePath);
-    writeFile(location.path(), content);
-    return location;
+    return writeFile(url(relativePath).path(), content);
 }
 
 Url DriveFixture::makeFolder(std::string_view relativePath) const

@@ -30,6 +30,9 @@ inline std::string contentOf(const platform::Url& url)
     return contentOf(url.path());
 }
 
+/// Writes a file and makes the folders above it. Answers its location.
+platform::Url writeFile(const std::string& path, std::string_view content);
+
 /// A drive in a temporary folder, with an account signed in and the host's real services installed, on queues
 /// and a clock that the test controls. Relative paths below start at the drive's top level
 /// ("Documents/Notes.txt"). Folders above a file are made.

@@ -13,7 +13,7 @@ namespace testing_support {
 /// wonderful" and a form: a name (called "Your name"), a check box, a choice of three towns, two radio
 /// buttons of which the first is pressed, a field that must not be changed, a hidden field, and a note by
 /// another person. The second page has a field for several lines.
-inline std::string formPdf(const std::string& trailer = {})
+inline std::string formPdf()
 {
     const std::string widget = "<</Type/Annot/Subtype/Widget/P 4 0 R";
     const std::string text = "/DA(/Helv 12 Tf 0 g)", tick = "0 0 m 20 20 l S";
@@ -65,8 +65,8 @@ inline std::string formPdf(const std::string& trailer = {})
         if (object != objects.end())
             pdf += std::to_string(number) + " 0 obj" + object->second + "endobj\n";
     }
-    return pdf + index + "trailer<</Root 1 0 R/Size 22" + trailer + ">>\nstartxref\n"
-        + std::to_string(pdf.size()) + "\n%%EOF\n";
+    return pdf + index + "trailer<</Root 1 0 R/Size 22>>\nstartxref\n" + std::to_string(pdf.size())
+        + "\n%%EOF\n";
 }
 
 } // namespace testing_support

@@ -13,15 +13,10 @@ public:
     bool fetchStarts = false; ///< whether a request for the offer starts a fetch
     std::shared_ptr<const platform::StorageOffer> offer;
     bool hasDefaultAction = false;
-    int performedActions = 0;
 
     bool fetchOfferIfNeeded() override { return fetchStarts; }
     std::shared_ptr<const platform::StorageOffer> currentOffer() const override { return offer; }
-    bool performDefaultAction(const platform::StorageOfferLink&) override
-    {
-        performedActions += hasDefaultAction ? 1 : 0;
-        return hasDefaultAction;
-    }
+    bool performDefaultAction(const platform::StorageOfferLink&) override { return hasDefaultAction; }
 
     static std::shared_ptr<platform::StorageOffer> make(int level, bool storageIsLow, int action = 3)
     {

@@ -3,7 +3,10 @@
 
 #pragma once
 
+#include <cstdlib>
 #include <filesystem>
+#include <fstream>
+#include <stdexcept>
 #include <string>
 #include <string_view>
 
@@ -12,8 +15,19 @@ namespace testing_support {
 /// A folder for one test, which is removed with everything in it at the end.
 class TemporaryDirectory {
 public:
-    TemporaryDirectory();
-    ~TemporaryDirectory();
+    TemporaryDirectory()
+    {
+        auto pattern = (std::filesystem::temp_directory_path() / "tarrow-test-XXXXXX").string();
+        if (!mkdtemp(pattern.data()))
+            throw std::runtime_error("cannot make a temporary folder");
+        // The path is canonical, so that it compares equal to the file system's answers.
+        _path = std::filesystem::canonical(pattern);
+    }
+    ~TemporaryDirectory()
+    {
+        std::error_code ignored;
+        std::filesystem::remove_all(_path, ignored);
+    }
     TemporaryDirectory(const TemporaryDirectory&) = delete;
     TemporaryDirectory& operator=(const TemporaryDirectory&) = delete;
 
@@ -21,7 +35,14 @@ public:
     /// Answers the path of an item below the folder.
     std::string at(std::string_view name) const { return (_path / name).string(); }
     /// Writes a file below the folder, and makes the folders above it. Answers its path.
-    std::string write(std::string_view name, std::string_view content) const;
+    std::string write(std::string_view name, std::string_view content) const
+    {
+        const auto file = _path / name;
+        std::filesystem::create_directories(file.parent_path());
+        std::ofstream(file, std::ios::binary)
+            .write(content.data(), static_cast<std::streamsize>(content.size()));
+        return file.string();
+    }
 
 private:
     std::filesystem::path _path;

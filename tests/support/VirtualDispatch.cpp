@@ -12,11 +12,16 @@ namespace {
 
 using namespace platform;
 
-class VirtualQueue : public platform::Queue, public std::enable_shared_from_this<VirtualQueue> {
+/// A queue of either kind, because all work runs on one thread.
+class VirtualQueue : public platform::Queue,
+                     public platform::OperationQueue,
+                     public std::enable_shared_from_this<VirtualQueue> {
 public:
-    VirtualQueue(std::weak_ptr<VirtualDispatch> dispatch, std::string label)
+    VirtualQueue(std::weak_ptr<VirtualDispatch> dispatch, std::string label,
+        platform::QualityOfService quality = platform::QualityOfService::UserInteractive)
         : _dispatch(std::move(dispatch))
         , _label(std::move(label))
+        , _quality(quality)
     {
     }
     void async(Work work) override
@@ -24,27 +29,14 @@ public:
         if (const auto dispatch = _dispatch.lock())
             dispatch->submit(Duration::zero(), weak_from_this(), std::move(work));
     }
+    void addOperation(Work work) override { async(std::move(work)); }
     const std::string& label() const override { return _label; }
+    const std::string& name() const override { return _label; }
+    platform::QualityOfService qualityOfService() const override { return _quality; }
 
 private:
     std::weak_ptr<VirtualDispatch> _dispatch;
     std::string _label;
-};
-
-class VirtualOperationQueue : public platform::OperationQueue {
-public:
-    VirtualOperationQueue(
-        std::weak_ptr<VirtualDispatch> dispatch, std::string name, platform::QualityOfService quality)
-        : _queue(std::make_shared<VirtualQueue>(std::move(dispatch), std::move(name)))
-        , _quality(quality)
-    {
-    }
-    void addOperation(Work work) override { _queue->async(std::move(work)); }
-    const std::string& name() const override { return _queue->label(); }
-    platform::QualityOfService qualityOfService() const override { return _quality; }
-
-private:
-    std::shared_ptr<VirtualQueue> _queue;
     platform::QualityOfService _quality;
 };
 
@@ -96,7 +88,7 @@ std::shared_ptr<platform::Queue> VirtualDispatch::makeSerialQueue(std::string la
 std::shared_ptr<platform::OperationQueue> VirtualDispatch::makeOperationQueue(
     std::string name, platform::QualityOfService quality)
 {
-    return std::make_shared<VirtualOperationQueue>(weak_from_this(), std::move(name), quality);
+    return std::make_shared<VirtualQueue>(weak_from_this(), std::move(name), quality);
 }
 
 void VirtualDispatch::after(Duration delay, const std::shared_ptr<platform::Queue>& queue, Work work)

@@ -5,6 +5,7 @@
 
 #include "platform/CloudDocumentService.h"
 #include "tests/support/ForwardingCoordinator.h"
+#include "tests/support/SimulatedCloud.h"
 
 #include <functional>
 #include <memory>
@@ -128,28 +129,22 @@ private:
     platform::DocumentIdentifiers& _real;
 };
 
-/// The real service with the decorators above in front of its roles.
-class DecoratedCloud : public platform::CloudDocumentService {
+/// The real documents with the decorators above in front of their roles.
+class DecoratedCloud : public testing_support::SimulatedCloud {
 public:
-    explicit DecoratedCloud(std::shared_ptr<platform::CloudDocumentService> real)
-        : decoratedItems(real->promisedItems())
+    explicit DecoratedCloud(const std::shared_ptr<platform::CloudDocumentService>& real)
+        : SimulatedCloud(real)
+        , decoratedItems(real->promisedItems())
         , decoratedIdentifiers(real->documentIdentifiers())
-        , _real(std::move(real))
     {
     }
     DecoratedItems decoratedItems;
     DecoratedIdentifiers decoratedIdentifiers;
     CountingAccess access;
 
-    platform::CloudAccount& account() override { return _real->account(); }
     platform::PromisedItems& promisedItems() override { return decoratedItems; }
-    platform::DocumentContainers& containers() override { return _real->containers(); }
-    platform::CloudItems& items() override { return _real->items(); }
     platform::DocumentIdentifiers& documentIdentifiers() override { return decoratedIdentifiers; }
     platform::SecurityScopedAccess& securityScopedAccess() override { return access; }
-
-private:
-    std::shared_ptr<platform::CloudDocumentService> _real;
 };
 
 } // namespace items_tests
