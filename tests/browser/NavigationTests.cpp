@@ -53,25 +53,6 @@ protected:
     }
 };
 
-TEST_F(NavigationTest, AFolderIsPushedAndConfigured)
-{
-    write("Folder/a.txt");
-    launch();
-    tapFolder(url("Folder"));
-    EXPECT_THAT(stack(), ElementsAre(top, "Folder"));
-    EXPECT_EQ(topList()->delegate(), browser);
-    EXPECT_EQ(topList()->view()->style().background, platform::Color::white());
-    EXPECT_EQ(browser->viewTitle(), "Folder");
-    EXPECT_TRUE(topList()->availableActions() & actionBit(DocumentListAction::PressurePop));
-    EXPECT_EQ(topList()->toolbarItems().size(), 3);
-    EXPECT_THAT(log->activities(), testing::Contains("Selected Folder (dlc)"));
-
-    browser->documentListControllerDidSelectContainerWithViewController(topList(), nullptr);
-    tapFolder(url("Folder"));
-    EXPECT_EQ(log->count("WARNING New DLC is nil"), 1);
-    EXPECT_EQ(browser->viewControllers().size(), 3);
-}
-
 TEST_F(NavigationTest, ADocumentIsPreviewedInTheModeThatFits)
 {
     struct Row {
@@ -194,8 +175,7 @@ TEST_F(NavigationTest, ASearchOpensAtTheTopOnceTheStackHasSettled)
     write("Folder/note.txt");
     for (const char* query : {"", "note"}) {
         launch();
-        browser->warpToNewURLPreviewMode(url("Folder"), PreviewModeQuick);
-        settle();
+        warp("Folder");
         UIUtils::showAlertMessageParentViewController("In the way", "", browser);
         browser->startSearch(query);
         EXPECT_THAT(stack(), ElementsAre(top));
@@ -207,22 +187,6 @@ TEST_F(NavigationTest, ASearchOpensAtTheTopOnceTheStackHasSettled)
         EXPECT_EQ(search()->query(), query);
         EXPECT_TRUE(search()->hasFocus());
     }
-}
-
-TEST_F(NavigationTest, AFolderThatWasSearchedForIsShownInItsRealPlace)
-{
-    write("Folder/Sub/note.txt");
-    launch();
-    openSearch();
-    tapFolder(url("Folder/Sub"));
-    EXPECT_EQ(search(), nullptr);
-    EXPECT_THAT(stack(), ElementsAre(top, "Folder", "Sub"));
-
-    openSearch();
-    const auto elsewhere = Url::fileURL(drive.folder().path().string());
-    tapFolder(elsewhere);
-    EXPECT_EQ(search(), nullptr);
-    EXPECT_THAT(stack(), ElementsAre(top, "Folder", "Sub", elsewhere.lastPathComponent()));
 }
 
 TEST_F(NavigationTest, ARemovedFolderIsLeft)

@@ -2,9 +2,7 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "browser/NavController.h"
-#include "drawing/FileTags.h"
 #include "kit/views/Label.h"
-#include "preview/PreviewMode.h"
 #include "prompts/DriveStatusLabelView.h"
 #include "screens/StorageUpgradeButton.h"
 #include "screens/UpgradeFlow.h"
@@ -47,17 +45,6 @@ TEST_F(StatusTest, TheLineHasTheItemsAndOnceItIsKnownTheFreeStorage)
     EXPECT_EQ(statusText(), itemsText(topList()->containedItemCount()) + ", 3 GB available");
 }
 
-TEST_F(StatusTest, TagsHaveTheColorsOfTheSharedTable)
-{
-    std::ofstream(drive.layout().keyValueStore()) << R"({"PathwellTagDict": {"PathwellTagDictVersion": 2,
-        "PathwellTags": [{"n": "Work", "l": 6}, {"n": "Plain"}]}})";
-    FileTags::_tagColorsDidChange();
-    launch();
-    const auto& colors = FileTags::_tagBlipColors();
-    EXPECT_THAT(browser->documentListControllerColorsForTagNames(topList(), {"Plain", "Unknown", "Work"}),
-        testing::ElementsAre(colors[0], colors[6]));
-}
-
 TEST_F(StatusTest, TheOfferAtLaunchIsTakenUnlessItIsStillBeingFetched)
 {
     offers->offer = SimulatedOffers::make(4, true);
@@ -79,8 +66,7 @@ TEST_F(StatusTest, AnOfferReachesEveryListAndTheQuotaIsFetchedThreeTimes)
 {
     write("Folder/a.txt", "a");
     launch();
-    browser->warpToNewURLPreviewMode(url("Folder"), PreviewModeQuick);
-    settle();
+    warp("Folder");
     EXPECT_THAT(view(1).primaryLabel()->text(), testing::StartsWith(itemsText(1)));
     // Only a list that was on top has a status bar.
     browser->popViewController(false);

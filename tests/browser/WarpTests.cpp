@@ -46,10 +46,6 @@ protected:
         browser->documentListControllerDidSelectItemAtURL(topList(), document);
         settle();
     }
-    bool warp(const char* path, int mode = PreviewModeQuick)
-    {
-        return browser->warpToNewURLPreviewMode(url(path), mode);
-    }
     Url shownItem() const { return browser->itemManager()->item()->url(); }
 };
 
@@ -62,7 +58,6 @@ TEST_F(WarpTest, AQuestionThatIsOpenIsDroppedUnanswered)
     LookwellItemController::defaultController()->showWarningAndDeleteDocument(nullptr);
     ASSERT_NE(alert(), nullptr);
     EXPECT_TRUE(warp("Folder/second.txt"));
-    settle();
     EXPECT_EQ(alert(), nullptr);
     EXPECT_THAT(stack(), ElementsAre(top, "Folder", "*"));
     EXPECT_TRUE(FileUtils::exists(first));
@@ -71,7 +66,6 @@ TEST_F(WarpTest, AQuestionThatIsOpenIsDroppedUnanswered)
     LookwellItemController::defaultController()->showWarningAndDeleteDocument(nullptr);
     ASSERT_NE(alert(), nullptr);
     EXPECT_FALSE(warp("../../trash/second.txt"));
-    settle();
     EXPECT_EQ(alert(), nullptr);
     EXPECT_THAT(stack(), ElementsAre(top, "Folder", "*"));
     EXPECT_TRUE(browser->itemManager()->filePresenterRegistered());
@@ -91,7 +85,6 @@ TEST_F(WarpTest, AMoveThatIsRunningEndsWithoutPullingTheScreenAlong)
     picker->choose(url("Target"));
     EXPECT_TRUE(FileUtils::exists(first)) << "not begun";
     EXPECT_TRUE(warp("Folder/second.txt", PreviewModeDetails));
-    settle();
     EXPECT_TRUE(FileUtils::exists(url("Target/first.txt"))) << "what was asked for happens";
     EXPECT_THAT(stack(), ElementsAre(top, "Folder", "i"));
     EXPECT_EQ(shownItem(), url("Folder/second.txt"));
@@ -110,7 +103,6 @@ TEST_F(WarpTest, ADocumentThatIsTappedWhileItsListMovesInKeepsItsManager)
             topList(), screens::DocumentListController::initWithURL(url("Folder")));
         EXPECT_TRUE(browser->isTransitioning());
         way();
-        settle();
         slow->movement.finish();
         EXPECT_THAT(stack(), ElementsAre(top, "Folder", "*"));
         ASSERT_NE(browser->itemManager(), nullptr);
@@ -122,31 +114,12 @@ TEST_F(WarpTest, ADocumentThatIsTappedWhileItsListMovesInKeepsItsManager)
     }
 }
 
-TEST_F(WarpTest, ThePreviewedDocumentIsShownAnew)
-{
-    write("Folder/note.txt");
-    launch();
-    for (int i = 0; i < 2; ++i) {
-        EXPECT_TRUE(warp("Folder/note.txt"));
-        settle();
-        EXPECT_THAT(stack(), ElementsAre(top, "Folder", "*"));
-        EXPECT_TRUE(browser->itemManager()->filePresenterRegistered());
-        EXPECT_TRUE(LookwellItemController::defaultController()->isVisible());
-    }
-    EXPECT_FALSE(FileUtils::moveTo(url("Folder/note.txt"), url("Folder/renamed.txt")));
-    settle();
-    EXPECT_EQ(shownItem(), url("Folder/renamed.txt"));
-    EXPECT_TRUE(LookwellItemController::defaultController()->isVisible());
-    EXPECT_TRUE(browser->itemManager()->filePresenterRegistered());
-}
-
 TEST_F(WarpTest, APreviewThatCannotShowADocumentOffersOtherApps)
 {
     using screens::PlaceholderView;
     const auto document = write("Folder/data.bin");
     launch();
     EXPECT_TRUE(warp("Folder/data.bin"));
-    settle();
     const auto screen = LookwellItemController::defaultController();
     const auto shown = std::dynamic_pointer_cast<PlaceholderView>(screen->screenView()->content());
     ASSERT_TRUE(shown && shown->buttons().size() == 1);
@@ -162,7 +135,6 @@ TEST_F(WarpTest, ADocumentThatOthersTakeAwayClosesItsPreview)
     write("Folder/note.txt");
     launch();
     EXPECT_TRUE(warp("Folder/note.txt"));
-    settle();
     EXPECT_FALSE(FileUtils::remove(url("Folder")));
     settle();
     EXPECT_EQ(browser->itemManager(), nullptr);
@@ -173,10 +145,7 @@ TEST_F(WarpTest, WhatIsDoneFromAPeekLeavesTheListWhereItIs)
 {
     const auto note = write("note.txt");
     launch();
-    const auto peek = [&](const Url& item) {
-        return browser->documentListControllerViewControllerForPreviewingItemAtURL(topList(), item);
-    };
-    ASSERT_NE(peek(note), nullptr);
+    browser->documentListControllerViewControllerForPreviewingItemAtURL(topList(), note);
     settle();
     EXPECT_FALSE(FileUtils::moveTo(note, url("renamed.txt")));
     settle();
@@ -187,14 +156,6 @@ TEST_F(WarpTest, WhatIsDoneFromAPeekLeavesTheListWhereItIs)
     EXPECT_THAT(stack(), ElementsAre(top, "*"));
     EXPECT_EQ(
         LookwellItemController::defaultController()->arrayOfDocuments(), std::vector{url("renamed.txt")});
-    browser->popViewController(false);
-    settle();
-
-    ASSERT_NE(peek(url("renamed.txt")), nullptr);
-    settle();
-    EXPECT_FALSE(FileUtils::remove(url("renamed.txt")));
-    settle();
-    EXPECT_THAT(stack(), ElementsAre(top));
 }
 
 } // namespace

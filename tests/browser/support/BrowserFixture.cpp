@@ -18,16 +18,6 @@ namespace testing_support {
 using kit::Window;
 using screens::DocumentListController;
 
-namespace {
-
-std::shared_ptr<platform::Localization> englishTexts()
-{
-    return std::make_shared<host::system::GettextLocalization>(
-        TRW_LOCALE_FOLDER, host::system::UserLocale{"en", "en_US"});
-}
-
-} // namespace
-
 BrowserFixture::BrowserFixture()
 {
     cloud = std::make_shared<SimulatedCloud>(drive.cloud);
@@ -35,15 +25,10 @@ BrowserFixture::BrowserFixture()
     set.appRegistry = apps;
     set.cloudDocumentService = cloud;
     set.documentSharing = std::make_shared<RecordingSharing>();
-    set.localization = englishTexts();
+    set.localization = std::make_shared<host::system::GettextLocalization>(
+        TRW_LOCALE_FOLDER, host::system::UserLocale{"en", "en_US"});
     set.storageOfferManager = offers;
     platform::installServices(std::move(set));
-}
-
-BrowserFixture::~BrowserFixture()
-{
-    browser = nullptr;
-    window = nullptr;
 }
 
 void BrowserFixture::launchWithoutListing()
@@ -64,6 +49,13 @@ void BrowserFixture::post(platform::Notification notice)
 {
     drive.notifications->post(notice);
     settle();
+}
+
+bool BrowserFixture::warp(const char* path, int mode)
+{
+    const bool isLed = browser->warpToNewURLPreviewMode(url(path), mode);
+    settle();
+    return isLed;
 }
 
 std::vector<std::string> BrowserFixture::stack() const

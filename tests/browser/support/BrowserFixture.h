@@ -7,6 +7,7 @@
 #include "items/DRItem.h"
 #include "platform/StateCoder.h"
 #include "platform/UserDefaults.h"
+#include "preview/PreviewMode.h"
 #include "tests/support/DriveFixture.h"
 #include "tests/support/SimulatedApps.h"
 #include "tests/support/SimulatedCloud.h"
@@ -29,7 +30,6 @@ protected:
     using List = std::shared_ptr<screens::DocumentListController>;
 
     BrowserFixture();
-    ~BrowserFixture() override;
 
     /// Makes a new browser, shows it and waits until its root list has reported its contents.
     void launch();
@@ -38,6 +38,8 @@ protected:
     void settle() { drive.settle(); }
     /// Posts a notification and runs the work that follows.
     void post(platform::Notification notice);
+    /// Leads the browser to an item, and runs the work that follows. Answers whether it let itself be led.
+    bool warp(const char* path, int mode = tarrow::PreviewModeQuick);
 
     platform::Url url(std::string_view relativePath) const { return drive.url(relativePath); }
     platform::Url write(std::string_view relativePath, std::string_view content = "content") const
