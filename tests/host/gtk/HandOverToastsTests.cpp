@@ -86,18 +86,6 @@ TEST_F(HandOverToastsTest, ContinuesWithWhatTheOtherDeviceShows)
     EXPECT_EQ(toasts->toast(), nullptr) << "what was taken does not come back with each renewal";
 }
 
-TEST_F(HandOverToastsTest, FollowsTheOffers)
-{
-    show("first.txt");
-    EXPECT_TRUE(title().starts_with("“first.txt”"));
-    const auto second = show("second.txt");
-    EXPECT_TRUE(title().starts_with("“second.txt”"));
-    other->resignCurrent(second);
-    rest();
-    EXPECT_EQ(toasts->toast(), nullptr);
-    EXPECT_TRUE(continued.empty());
-}
-
 TEST_F(HandOverToastsTest, IsDismissedForAsLongAsTheDocumentIsShown)
 {
     show("first.txt");

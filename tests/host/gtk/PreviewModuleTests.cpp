@@ -4,11 +4,8 @@
 #include "WindowFixture.h"
 #include "host/gtk/preview/PrintablePages.h"
 #include "host/system/queues/GLibDispatch.h"
-#include "platform/NotificationCenter.h"
-#include "platform/Services.h"
 #include "screens/preview/PreviewMediaView.h"
 #include "screens/preview/PreviewTextView.h"
-#include "tests/support/PlainTexts.h"
 #include "tests/support/SimplePdf.h"
 #include "tests/support/TemporaryDirectory.h"
 
@@ -36,11 +33,8 @@ class MissingPreviews : public testing_support::WindowFixture,
 protected:
     MissingPreviews()
     {
-        platform::ServiceSet set;
-        set.dispatch = std::make_shared<host::system::GLibDispatch>();
-        set.localization = std::make_shared<testing_support::PlainTexts>();
-        set.notificationCenter = std::make_shared<platform::NotificationCenter>();
-        platform::installServices(std::move(set));
+        installed.dispatch = std::make_shared<host::system::GLibDispatch>();
+        platform::installServices(installed);
         if (*GetParam().contentOf)
             std::filesystem::copy_file(GetParam().contentOf, folder.at("previews.so"));
         previews = PreviewModule::inFile(folder.at("previews.so"));

@@ -6,13 +6,10 @@
 #include "host/previews/PopplerDocuments.h"
 #include "host/system/queues/GLibDispatch.h"
 #include "host/system/texts/IcuFormatters.h"
-#include "platform/NotificationCenter.h"
-#include "platform/Services.h"
 #include "screens/preview/PreviewMediaView.h"
 #include "screens/preview/PreviewPagesView.h"
 #include "screens/preview/PreviewPictureView.h"
 #include "screens/preview/PreviewTextView.h"
-#include "tests/support/PlainTexts.h"
 #include "tests/support/SimplePdf.h"
 #include "tests/support/TemporaryDirectory.h"
 
@@ -30,13 +27,10 @@ class PreviewViewTests : public testing_support::WindowFixture {
 protected:
     PreviewViewTests()
     {
-        platform::ServiceSet set;
-        set.dispatch = dispatch;
-        set.formatters = std::make_shared<host::system::IcuFormatters>("en_US");
-        set.localization = std::make_shared<testing_support::PlainTexts>();
-        set.notificationCenter = std::make_shared<platform::NotificationCenter>();
-        set.pagedDocumentOpener = std::make_shared<host::previews::PopplerDocuments>();
-        platform::installServices(std::move(set));
+        installed.dispatch = dispatch;
+        installed.formatters = std::make_shared<host::system::IcuFormatters>("en_US");
+        installed.pagedDocumentOpener = std::make_shared<host::previews::PopplerDocuments>();
+        platform::installServices(installed);
     }
 
     /// Shows a view as large as the window.

@@ -9,13 +9,11 @@
 #include "kit/views/ListView.h"
 #include "kit/views/TextField.h"
 
-#include <gmock/gmock.h>
-
+#include <algorithm>
 #include <map>
 #include <numeric>
 
 namespace {
-using ::testing::ElementsAre;
 using testing_support::makeScreen;
 
 class NavigationTests : public testing_support::WindowFixture {
@@ -107,60 +105,6 @@ protected:
     std::shared_ptr<kit::ViewController> root;
 };
 
-TEST_F(AlertTests, AnAlertMayRefuseToClose)
-{
-    const auto alert =
-        std::make_shared<kit::AlertController>("New Folder", "Enter a name.", kit::AlertStyle::Alert);
-    alert->addTextField([](kit::TextField& field) { field.setPlaceholder("Name"); });
-    const auto create = std::make_shared<kit::AlertAction>("Create", kit::AlertActionStyle::Default);
-    bool mayClose = false;
-    create->setShouldClose([&] { return mayClose; });
-    alert->addAction(std::make_shared<kit::AlertAction>("Cancel", kit::AlertActionStyle::Cancel));
-    alert->addAction(create);
-    present(alert);
-
-    const auto& field = alert->textFields().front();
-    auto* entry = nativeOf(*field);
-    EXPECT_TRUE(gtk_widget_has_focus(GTK_WIDGET(gtk_editable_get_delegate(GTK_EDITABLE(entry)))));
-    EXPECT_TRUE(field->isEditing());
-    EXPECT_GE(gtk_widget_get_height(peerOf(*field)->widget()), 44);
-    gtk_editable_set_text(GTK_EDITABLE(entry), "Plans");
-    EXPECT_EQ(field->text(), "Plans");
-    // The screen below takes no focus while the alert is shown.
-    EXPECT_FALSE(gtk_widget_grab_focus(peer().rootPeer()->widget()));
-
-    create->setEnabled(false);
-    settle();
-    EXPECT_FALSE(gtk_widget_is_sensitive(findButton("Create")));
-    create->setEnabled(true);
-    settle();
-    g_signal_emit_by_name(findButton("Create"), "clicked");
-    settle();
-    EXPECT_EQ(root->presentedViewController(), alert);
-    mayClose = true;
-    g_signal_emit_by_name(findButton("Create"), "clicked");
-    settle();
-    EXPECT_EQ(root->presentedViewController(), nullptr);
-    EXPECT_EQ(findButton("Create"), nullptr);
-}
-
-TEST_F(AlertTests, EscapeCancelsAndAnimationsEnd)
-{
-    g_object_set(gtk_settings_get_default(), "gtk-enable-animations", TRUE, nullptr);
-    for (const auto style : {kit::AlertStyle::Alert, kit::AlertStyle::ActionSheet}) {
-        int cancelled = 0;
-        const auto alert = std::make_shared<kit::AlertController>("Delete?", "", style);
-        alert->addAction(std::make_shared<kit::AlertAction>("Delete", kit::AlertActionStyle::Destructive));
-        alert->addAction(std::make_shared<kit::AlertAction>(
-            "Cancel", kit::AlertActionStyle::Cancel, [&](const auto&) { ++cancelled; }));
-        present(alert);
-        EXPECT_TRUE(window->backRequested());
-        waitFor([&] { return cancelled == 1; }, "the cancel action");
-        settle();
-        EXPECT_EQ(findButton("Delete"), nullptr);
-    }
-}
-
 TEST_F(AlertTests, TheKeyboardGoesThroughAnAlertAndBack)
 {
     root = makeScreen("Root");
@@ -179,15 +123,22 @@ TEST_F(AlertTests, TheKeyboardGoesThroughAnAlertAndBack)
     alert->addTextField([](kit::TextField& field) { field.setText("Plans"); });
     const auto cancel = std::make_shared<kit::AlertAction>("Cancel", kit::AlertActionStyle::Default);
     alert->addAction(cancel);
-    alert->addAction(std::make_shared<kit::AlertAction>("Done", kit::AlertActionStyle::Default));
+    const auto done = std::make_shared<kit::AlertAction>("Done", kit::AlertActionStyle::Default);
+    alert->addAction(done);
     alert->setEscapeAction(cancel);
     root->presentViewController(alert, true);
     settle();
+    EXPECT_FALSE(gtk_widget_grab_focus(peer().rootPeer()->widget()))
+        << "the screen below takes no focus while the alert is shown";
+    EXPECT_GE(gtk_widget_get_height(peerOf(*alert->textFields().front())->widget()), 44);
     for (const char* next : {"Cancel", "Done"}) {
         gtk_widget_child_focus(windowWidget(), GTK_DIR_TAB_FORWARD);
         settle();
         EXPECT_EQ(focus(), findButton(next)) << "the field that was left does not take the focus along";
     }
+    done->setEnabled(false);
+    settle();
+    EXPECT_FALSE(gtk_widget_is_sensitive(findButton("Done")));
     EXPECT_TRUE(window->backRequested());
     settle();
     EXPECT_EQ(root->presentedViewController(), nullptr);
@@ -208,7 +159,7 @@ TEST_F(AlertTests, AnAlertIsAsHighAsItsBrokenLines)
         << "nothing is hidden where the window has the room";
 }
 
-class Numbers : public kit::ListViewDataSource, public kit::ListViewDelegate {
+class Numbers : public kit::ListViewDataSource {
 public:
     std::size_t numberOfRows(const kit::ListView&) const override { return ids.size(); }
     kit::ListRow rowAtIndex(const kit::ListView&, std::size_t index) const override
@@ -219,22 +170,9 @@ public:
         return row;
     }
     kit::RowId rowIdAtIndex(const kit::ListView&, std::size_t index) const override { return ids[index]; }
-    void rowActivated(kit::ListView&, std::size_t index) override { activated.push_back(ids[index]); }
-    bool rowHeld(kit::ListView&, std::size_t index) override
-    {
-        held.push_back(ids[index]);
-        return true;
-    }
-    kit::Menu menuForRow(kit::ListView&, std::size_t index) override
-    {
-        menus.push_back(ids[index]);
-        return {};
-    }
 
-    std::vector<kit::RowId> held, menus;
     std::vector<kit::RowId> ids;
     std::map<kit::RowId, std::string> titles;
-    std::vector<kit::RowId> activated;
 };
 
 class ListTests : public testing_support::WindowFixture {
@@ -245,7 +183,6 @@ protected:
         std::iota(rows->ids.begin(), rows->ids.end(), 1);
         const auto screen = makeScreen("List");
         list->setDataSource(rows);
-        list->setListDelegate(rows);
         list->setAutoresizing({true, true});
         list->setFrame(screen->view()->bounds());
         screen->view()->addSubview(list);
@@ -309,25 +246,6 @@ TEST_F(ListTests, RowWidgetsMatchTheModelThroughEveryChange)
     expectRowsMatch();
 }
 
-TEST_F(ListTests, ATapOpensAndInSelectionModeMarks)
-{
-    showRows(4);
-    const auto activate = [&](guint position) {
-        g_signal_emit_by_name(listPeer().listWidget(), "activate", position);
-        settle();
-    };
-    activate(2);
-    EXPECT_THAT(rows->activated, ElementsAre(3U));
-    list->setSelectionMode(kit::SelectionMode::Multiple);
-    settle();
-    activate(1);
-    activate(3);
-    activate(1);
-    EXPECT_THAT(rows->activated, ElementsAre(3U));
-    EXPECT_THAT(list->selection().inOrder(list->rowIds()), ElementsAre(4U));
-    expectRowsMatch();
-}
-
 TEST_F(ListTests, ManyChangesElsewhereKeepThePlaceAndTheFocus)
 {
     showRows(5000);
@@ -361,19 +279,6 @@ TEST_F(ListTests, ManyChangesElsewhereKeepThePlaceAndTheFocus)
     std::erase(after, 2504U);
     change(after);
     waitFor([&] { return focusedId() == 2505; }, "the focus to come to the row behind");
-}
-
-TEST_F(ListTests, AssistiveTechnologyCanOpenAskForTheMenuAndPeek)
-{
-    showRows(4);
-    for (auto* row : listPeer().liveRows()) {
-        for (const char* action : {"row.activate", "row.menu", "row.peek"})
-            EXPECT_TRUE(gtk_widget_activate_action(row, action, nullptr));
-    }
-    settle();
-    EXPECT_EQ(rows->activated.size(), 4U);
-    EXPECT_EQ(rows->menus, rows->activated);
-    EXPECT_EQ(rows->held, rows->activated);
 }
 
 TEST_F(ListTests, AHundredThousandRowsCostWhatIsNearTheVisibleOnes)

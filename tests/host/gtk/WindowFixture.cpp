@@ -8,7 +8,6 @@
 #include "kit/controllers/NavigationItem.h"
 #include "kit/controllers/ViewController.h"
 #include "platform/NotificationCenter.h"
-#include "platform/Services.h"
 #include "tests/support/PlainTexts.h"
 
 namespace testing_support {
@@ -45,10 +44,9 @@ WindowFixture::WindowFixture()
         nullptr, host::gtk::WindowSize{400, 700, false}, linkedPreviews()))
     , window(std::make_shared<kit::Window>())
 {
-    platform::ServiceSet set;
-    set.localization = std::make_shared<PlainTexts>();
-    set.notificationCenter = std::make_shared<platform::NotificationCenter>();
-    platform::installServices(std::move(set));
+    installed.localization = std::make_shared<PlainTexts>();
+    installed.notificationCenter = std::make_shared<platform::NotificationCenter>();
+    platform::installServices(installed);
     kit::WindowHost::install(host);
     g_object_set(gtk_settings_get_default(), "gtk-enable-animations", FALSE, nullptr);
 }

@@ -9,6 +9,7 @@
 #include "host/gtk/screens/NavigationPeer.h"
 #include "kit/controllers/NavigationController.h"
 #include "kit/controllers/Window.h"
+#include "platform/Services.h"
 
 #include <gtest/gtest.h>
 
@@ -50,6 +51,8 @@ protected:
     /// Answers the first button below the window whose label has this text, or null.
     GtkWidget* findButton(const std::string& text) const;
 
+    /// These services are installed; a fixture that needs more of them installs a larger copy.
+    platform::ServiceSet installed;
     std::shared_ptr<host::gtk::GtkWindowHost> host;
     std::shared_ptr<kit::Window> window;
 };
