@@ -11,12 +11,11 @@
 
 #include <sys/wait.h>
 
-#include <atomic>
 #include <cerrno>
-#include <csignal>
 #include <filesystem>
 #include <fstream>
 #include <thread>
+#include <vector>
 
 namespace {
 
@@ -40,28 +39,7 @@ protected:
         coordinator.addFilePresenter(presenter);
         return presenter;
     }
-    Url makeFile(const std::string& name) const
-    {
-        std::ofstream(_folder.at(name)) << "0";
-        return Url::fileURL(_folder.at(name));
-    }
-    /// Adds one to the number in a file, which is correct only with exclusive access.
-    static void count(LocalFileCoordinator& coordinator, const Url& url)
-    {
-        const auto failed = coordinator.coordinateWriting(url, WritingOptions::None, [](const Url& at) {
-            int number = 0;
-            std::ifstream(at.path()) >> number;
-            std::this_thread::yield();
-            std::ofstream(at.path()) << number + 1;
-        });
-        ASSERT_FALSE(failed);
-    }
-    static int numberIn(const Url& url)
-    {
-        int number = -1;
-        std::ifstream(url.path()) >> number;
-        return number;
-    }
+    Url makeFile(const std::string& name) const { return Url::fileURL(_folder.write(name, "0")); }
 
     testing_support::TemporaryDirectory _folder;
     std::shared_ptr<testing_support::RecordingLog> _log = testing_support::RecordingLog::install();
@@ -72,79 +50,45 @@ protected:
 
 TEST_F(FileCoordinatorTest, writersOfThreadsAndProcessesHaveTheirItemToThemselves)
 {
-    constexpr int rounds = 400;
-    const auto url = makeFile("number");
-    const auto child = ::fork();
-    const auto countAll = [&] {
-        LocalFileCoordinator own(settings());
-        for (int round = 0; round < rounds; ++round)
-            count(own, url);
+    constexpr int rounds = 50;
+    const auto url = makeFile("number"), other = Url::fileURL(_folder.at("other"));
+    const auto numberInFile = [&] {
+        int number = -1;
+        std::ifstream(url.path()) >> number;
+        return number;
     };
+    // Adding one to the number in the file is correct only with exclusive access.
+    const auto addOne = [&] {
+        const int number = numberInFile();
+        std::this_thread::yield();
+        std::ofstream(url.path()) << number + 1;
+    };
+    const auto countAll = [&](LocalFileCoordinator& coordinator) {
+        const auto move = [&](const Url& from, const Url& to) {
+            return coordinator.coordinateWriting(from, WritingOptions::ForMoving, to,
+                WritingOptions::ForReplacing, [&](const Url&, const Url&) { addOne(); });
+        };
+        for (int round = 0; round < rounds; ++round) {
+            EXPECT_FALSE(
+                coordinator.coordinateWriting(url, WritingOptions::None, [&](const Url&) { addOne(); }));
+            EXPECT_FALSE(move(url, other));
+            EXPECT_FALSE(move(other, url)) << "they wait for each other";
+        }
+    };
+    const auto child = ::fork();
+    LocalFileCoordinator shared(settings()), own(settings());
     if (child == 0) {
-        countAll();
+        countAll(own);
         ::_exit(0);
     }
-    std::thread other(countAll);
-    countAll();
-    other.join();
+    std::vector<std::jthread> threads;
+    for (auto* coordinator : {&shared, &shared, &own})
+        threads.emplace_back([&, coordinator] { countAll(*coordinator); });
+    threads.clear();
     int status = -1;
     ::waitpid(child, &status, 0);
     EXPECT_EQ(status, 0);
-    EXPECT_EQ(numberIn(url), 3 * rounds);
-}
-
-TEST_F(FileCoordinatorTest, aKilledProcessLeavesNoLock)
-{
-    const auto url = makeFile("held");
-    int ready[2];
-    ASSERT_EQ(::pipe(ready), 0);
-    const auto child = ::fork();
-    if (child == 0) {
-        LocalFileCoordinator own(settings());
-        own.coordinateWriting(url, WritingOptions::None, [&](const Url&) {
-            static_cast<void>(::write(ready[1], "x", 1) + 1);
-            for (;;)
-                ::pause();
-        });
-    }
-    char byte = 0;
-    ASSERT_EQ(::read(ready[0], &byte, 1), 1);
-    std::atomic<bool> isDead = false;
-    std::thread writer([&] {
-        LocalFileCoordinator own(settings());
-        own.coordinateWriting(Url::fileURL(_folder.path().string()), WritingOptions::ForDeleting,
-            [&](const Url&) { EXPECT_TRUE(isDead); });
-    });
-    isDead = true;
-    ::kill(child, SIGKILL);
-    ::waitpid(child, nullptr, 0);
-    writer.join();
-    ::close(ready[0]);
-    ::close(ready[1]);
-}
-
-TEST_F(FileCoordinatorTest, twoWritersInOppositeOrderDoNotWaitForEachOther)
-{
-    LocalFileCoordinator coordinator;
-    const auto a = Url::fileURL("/a/x"), b = Url::fileURL("/b");
-    std::atomic<int> inside = 0, most = 0, runs = 0;
-    const auto write = [&](const Url& first, const Url& second) {
-        for (int round = 0; round < 2000; ++round) {
-            const auto failed = coordinator.coordinateWriting(first, WritingOptions::ForMoving, second,
-                WritingOptions::ForReplacing, [&](const Url&, const Url&) {
-                    most = std::max(most.load(), ++inside);
-                    ++runs;
-                    --inside;
-                });
-            EXPECT_FALSE(failed);
-        }
-    };
-    std::thread forth([&] { write(a, b); });
-    std::thread back([&] { write(b, a); });
-    forth.join();
-    back.join();
-    EXPECT_EQ(runs, 4000);
-    EXPECT_EQ(most, 1);
+    EXPECT_EQ(numberInFile(), 4 * 3 * rounds);
 }
 
 TEST_F(FileCoordinatorTest, anAccessorMayCoordinateAgainForItemsThatItsThreadHolds)

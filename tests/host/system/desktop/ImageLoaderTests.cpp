@@ -26,8 +26,7 @@ std::string twoColors(int width, int height)
 struct ErrorRow {
     const char* name;
     std::string content;
-    std::string_view domain;
-    int code;
+    ImageErrorCode code;
 };
 
 TEST(ImageLoader, KeepsColorsAndMakesLargePicturesSmaller)
@@ -54,20 +53,18 @@ TEST(ImageLoader, SaysWhyAPictureCannotBeShown)
     const TemporaryDirectory folder;
     const GdkPixbufImageLoader loader;
     const ImageLimits limits{.maxFileBytes = 100'000, .maxSourcePixels = 10'000};
-    const auto damaged = static_cast<int>(ImageErrorCode::Damaged);
-    const auto tooLarge = static_cast<int>(ImageErrorCode::TooLarge);
     const ErrorRow rows[] = {
-        {"no picture", "just words", errorDomain::image, damaged},
-        {"empty", "", errorDomain::image, damaged},
-        {"header names too many pixels", "P6 30000 30000 255\n", errorDomain::image, tooLarge},
-        {"too many bytes", std::string(100'001, ' '), errorDomain::image, tooLarge},
+        {"no picture", "just words", ImageErrorCode::Damaged},
+        {"empty", "", ImageErrorCode::Damaged},
+        {"header names too many pixels", "P6 30000 30000 255\n", ImageErrorCode::TooLarge},
+        {"too many bytes", std::string(100'001, ' '), ImageErrorCode::TooLarge},
     };
     for (const auto& row : rows) {
         SCOPED_TRACE(row.name);
         const auto loaded = loader.load(folder.write("picture.ppm", row.content), limits);
         ASSERT_TRUE(loaded.error);
-        EXPECT_EQ(loaded.error->domain(), row.domain);
-        EXPECT_EQ(loaded.error->code(), row.code);
+        EXPECT_EQ(loaded.error->domain(), errorDomain::image);
+        EXPECT_EQ(loaded.error->code(), static_cast<int>(row.code));
     }
     const auto missing = loader.load(folder.at("missing.png"), limits);
     ASSERT_TRUE(missing.error);

@@ -3,15 +3,11 @@
 
 #include "host/system/desktop/JournalLogSink.h"
 
-#include "tests/support/TemporaryDirectory.h"
-
-#include <fcntl.h>
 #include <gtest/gtest.h>
-#include <unistd.h>
 
 #include <cstdlib>
-#include <fstream>
 #include <functional>
+#include <sstream>
 #include <thread>
 #include <vector>
 
@@ -19,26 +15,6 @@ using namespace platform;
 using host::system::LogSettings;
 
 namespace {
-
-/// Redirects standard error to a file while it lives.
-class StandardErrorAsFile {
-public:
-    explicit StandardErrorAsFile(const std::string& path)
-        : _before(::dup(STDERR_FILENO))
-    {
-        const int file = ::open(path.c_str(), O_WRONLY | O_CREAT | O_APPEND, 0600);
-        ::dup2(file, STDERR_FILENO);
-        ::close(file);
-    }
-    ~StandardErrorAsFile()
-    {
-        ::dup2(_before, STDERR_FILENO);
-        ::close(_before);
-    }
-
-private:
-    int _before;
-};
 
 class JournalLogSinkTest : public testing::Test {
 protected:
@@ -50,22 +26,18 @@ protected:
         setLogLevel(LogLevel::Debug);
     }
     /// Answers the lines that the work logs.
-    std::vector<std::string> logged(const std::function<void()>& work)
+    static std::vector<std::string> logged(const std::function<void()>& work)
     {
-        const auto path = directory.at("log");
-        {
-            const StandardErrorAsFile redirected(path);
-            host::system::installSystemLog();
-            work();
-        }
+        testing::internal::CaptureStderr();
+        host::system::installSystemLog();
+        work();
         std::vector<std::string> lines;
-        std::ifstream file(path);
-        for (std::string line; std::getline(file, line);)
+        std::istringstream text(testing::internal::GetCapturedStderr());
+        for (std::string line; std::getline(text, line);)
             lines.push_back(line);
         return lines;
     }
 
-    testing_support::TemporaryDirectory directory;
     static constexpr Operation op{"-[Test logs]"};
 };
 

@@ -9,6 +9,7 @@
 
 #include <filesystem>
 #include <fstream>
+#include <functional>
 #include <iostream>
 #include <iterator>
 #include <map>
@@ -32,9 +33,9 @@ void answer(const std::optional<platform::Error>& error)
     answer(error ? std::to_string(error->code()) : "done");
 }
 
-void append(const std::string& path)
+void append(const Url& at)
 {
-    std::ofstream(path, std::ios::app) << "more";
+    std::ofstream(at.path(), std::ios::app) << "more";
 }
 
 /// Holds an item until the next line of the input.
@@ -45,76 +46,40 @@ void hold(const Url&)
     std::getline(std::cin, line);
 }
 
-/// Moves in steps, which is correct only while no other program touches the item.
-bool moveInSteps(const std::string& from, const std::string& to)
-{
-    if (!fs::exists(from))
-        return false;
-    fs::copy_file(from, to);
-    return fs::remove(from);
-}
+using Command = std::function<void(LocalFileCoordinator&, const Words&)>;
 
-using Command = void (*)(LocalFileCoordinator&, const Words&);
+/// Makes the command that changes the item in its first word, alone with it.
+Command writing(WritingOptions options, void (*change)(const Url&))
+{
+    return
+        [=](auto& to, auto& words) { answer(to.coordinateWriting(Url::fileURL(words[1]), options, change)); };
+}
 
 const std::map<std::string, Command> commands = {
     {"reads",
         [](auto& to, auto& words) {
             answer(to.coordinateReading(Url::fileURL(words[1]), ReadingOptions::None, hold));
         }},
-    {"writes",
-        [](auto& to, auto& words) {
-            answer(to.coordinateWriting(Url::fileURL(words[1]), WritingOptions::None, hold));
-        }},
-    {"append",
-        [](auto& to, auto& words) {
-            answer(to.coordinateWriting(
-                Url::fileURL(words[1]), WritingOptions::None, [](const Url& at) { append(at.path()); }));
-        }},
+    {"writes", writing(WritingOptions::None, hold)},
+    {"append", writing(WritingOptions::None, append)},
     {"save",
-        [](auto& to, auto& words) {
-            answer(to.coordinateWriting(Url::fileURL(words[1]), WritingOptions::ForReplacing,
-                [](const Url& at) { host::system::writeFileAtomically(at.path(), "saved"); }));
-        }},
+        writing(WritingOptions::ForReplacing,
+            [](const Url& at) { host::system::writeFileAtomically(at.path(), "saved"); })},
+    {"remove", writing(WritingOptions::ForDeleting, [](const Url& at) { fs::remove_all(at.path()); })},
     {"move",
         [](auto& to, auto& words) {
             answer(to.coordinateWriting(Url::fileURL(words[1]), WritingOptions::ForMoving,
                 Url::fileURL(words[2]), WritingOptions::ForReplacing,
                 [](const Url& from, const Url& target) { fs::rename(from.path(), target.path()); }));
         }},
-    {"race",
-        [](auto& to, auto& words) {
-            bool isMoved = false;
-            to.coordinateWriting(Url::fileURL(words[1]), WritingOptions::ForMoving, Url::fileURL(words[2]),
-                WritingOptions::ForReplacing, [&](const Url& from, const Url& target) {
-                    isMoved = moveInSteps(from.path(), target.path());
-                });
-            answer(isMoved ? "won" : "lost");
-        }},
-    {"remove",
-        [](auto& to, auto& words) {
-            answer(to.coordinateWriting(Url::fileURL(words[1]), WritingOptions::ForDeleting,
-                [](const Url& at) { fs::remove_all(at.path()); }));
-        }},
     // These act like programs without coordination.
-    {"write", [](auto&, auto& words) { append(words[1]), answer("done"); }},
+    {"write", [](auto&, auto& words) { append(Url::fileURL(words[1])), answer("done"); }},
     {"rename", [](auto&, auto& words) { fs::rename(words[1], words[2]), answer("done"); }},
     {"delete", [](auto&, auto& words) { fs::remove_all(words[1]), answer("done"); }},
-    {"backup",
-        [](auto&, auto& words) {
-            fs::rename(words[1], words[1] + "~");
-            append(words[1]);
-            answer("done");
-        }},
-    {"evict",
-        [](auto&, auto& words) {
-            fs::rename(words[1], words[2]);
-            append(words[3]);
-            answer("done");
-        }},
     {"flood",
         [](auto&, auto& words) {
             for (int turn = 0; turn < std::stoi(words[2]); ++turn) {
-                append(words[1]);
+                append(Url::fileURL(words[1]));
                 fs::remove(words[1]);
             }
             answer("done");

@@ -95,18 +95,6 @@ TEST_P(DispatchContract, SerialQueueRunsOneAtATimeInOrder)
     EXPECT_TRUE(std::ranges::is_sorted(order));
 }
 
-TEST_P(DispatchContract, OperationQueueRunsEverythingOnce)
-{
-    const auto queue = dispatch.makeOperationQueue("sums", QualityOfService::Background);
-    EXPECT_EQ(queue->name(), "sums");
-    EXPECT_EQ(queue->qualityOfService(), QualityOfService::Background);
-    std::atomic<int> sum = 0;
-    for (int i = 1; i <= 100; ++i)
-        queue->addOperation([&, i] { sum += i; });
-    runUntil([&] { return sum >= 5050; });
-    EXPECT_EQ(sum, 5050);
-}
-
 TEST_P(DispatchContract, DelayedWorkComesInTheOrderOfItsTimes)
 {
     std::vector<int> order;
