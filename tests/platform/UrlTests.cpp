@@ -9,20 +9,6 @@ using namespace platform;
 
 namespace {
 
-TEST(Url, ParsesSchemePathAndQuery)
-{
-    const auto url = Url::parse("tarrowdriveapp://host/path/to%20a/D%25oc.txt?mode=details&a%20b=%26&flag");
-    ASSERT_TRUE(url);
-    EXPECT_EQ(url->scheme(), "tarrowdriveapp");
-    EXPECT_EQ(url->host(), "host");
-    EXPECT_EQ(url->path(), "/path/to a/D%oc.txt");
-    ASSERT_EQ(url->queryItems().size(), 3U);
-    EXPECT_EQ(url->queryItems()[0].value, "details");
-    EXPECT_EQ(url->queryItems()[1].name, "a b");
-    EXPECT_EQ(url->queryItems()[1].value, "&");
-    EXPECT_FALSE(url->queryItems()[2].value);
-}
-
 TEST(Url, RefusesWhatCannotBeALocation)
 {
     for (const std::string text : {"", "no-scheme", "://x", "1a:/x", "s:/a b", "s:/a\nb", "s:/%", "s:/%4",
@@ -55,16 +41,6 @@ TEST(Url, SplitsAndJoinsNames)
         {"/x/.hidden.txt", "txt"}, {"/x.d/none", ""}, {"/x/a.b c", ""}};
     for (const auto& [path, extension] : extensions)
         EXPECT_EQ(Url::fileURL(path).pathExtension(), extension) << path;
-}
-
-TEST(Url, ComparesPlacesNameByName)
-{
-    const auto root = Url::fileURL("/drive/Documents");
-    EXPECT_TRUE(root.isWithin(root));
-    EXPECT_TRUE(Url::fileURL("/drive/Documents/a").isWithin(root));
-    EXPECT_FALSE(Url::fileURL("/drive/Documents-evil/a").isWithin(root));
-    EXPECT_FALSE(Url::fileURL("/drive").isWithin(root));
-    EXPECT_TRUE(Url::fileURL("/a").isWithin(Url::fileURL("/")));
 }
 
 } // namespace

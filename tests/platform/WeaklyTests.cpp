@@ -13,21 +13,16 @@ using platform::weaklyOr;
 
 namespace {
 
-struct Base : std::enable_shared_from_this<Base> {
-    virtual ~Base() = default;
-};
-
 /// Writes down its steps in a list that outlives it.
-struct Listener : Base {
+struct Listener : std::enable_shared_from_this<Listener> {
     explicit Listener(std::vector<std::string>& heard)
         : list(heard)
     {
     }
-    ~Listener() override { list.emplace_back("end"); }
+    ~Listener() { list.emplace_back("end"); }
 
     void step() { list.emplace_back("step"); }
     void hear(const std::string& what, int number) { list.push_back(what + " " + std::to_string(number)); }
-    void take(std::unique_ptr<int> number) { list.push_back("took " + std::to_string(*number)); }
     bool answer(int number) const { return number == 7; }
 
     std::vector<std::string>& list;
@@ -41,7 +36,7 @@ protected:
 
 using Lines = std::vector<std::string>;
 
-TEST_F(Weakly, CallsAMemberOfADerivedClassUntilTheObjectIsGone)
+TEST_F(Weakly, CallsAMemberUntilTheObjectIsGone)
 {
     const std::function<void()> pointer = weakly(listener.get(), &Listener::step);
     const std::function<void()> strong = weakly(listener, &Listener::step);
@@ -63,12 +58,7 @@ TEST_F(Weakly, PassesBoundArgumentsFirstAndLeavesOutWhatTheStepDoesNotTake)
     bound(2);
     const std::function<void(int)> without = weakly(listener, &Listener::step);
     without(3);
-    const std::function<void(std::unique_ptr<int>)> moved = weakly(listener, &Listener::take);
-    moved(std::make_unique<int>(4));
-    EXPECT_EQ(heard, (Lines{"bound 1", "bound 2", "step", "took 4"}));
-
-    const auto wrong = weakly(listener, &Listener::hear);
-    EXPECT_FALSE((std::invocable<decltype(wrong), int>));
+    EXPECT_EQ(heard, (Lines{"bound 1", "bound 2", "step"}));
 }
 
 TEST_F(Weakly, KeepsTheObjectUntilTheStepIsOver)
