@@ -7,8 +7,6 @@
 #include "kit/controllers/NavigationItem.h"
 #include "kit/controllers/SearchPresentation.h"
 #include "kit/controllers/Window.h"
-#include "kit/values/TransitionCoordinator.h"
-#include "kit/views/TextField.h"
 #include "kit/views/View.h"
 
 #include <gtest/gtest.h>
@@ -105,6 +103,15 @@ protected:
         window->makeKeyAndVisible();
     }
     Events take() { return std::exchange(events, {}); }
+    /// Makes an alert that records its answer.
+    std::shared_ptr<AlertController> question()
+    {
+        const auto alert = std::make_shared<AlertController>("Title", "Message", AlertStyle::Alert);
+        const auto note = [this](const auto& action) { events.push_back(action->title()); };
+        alert->addAction(std::make_shared<AlertAction>("Cancel", AlertActionStyle::Cancel, note));
+        alert->addAction(std::make_shared<AlertAction>("Create", AlertActionStyle::Default, note));
+        return alert;
+    }
 
     Events events;
     std::shared_ptr<ShownScreens> delegate = std::make_shared<ShownScreens>(events);
@@ -178,27 +185,22 @@ TEST_F(Screens, WaitForTheMovementOfAHost)
 namespace {
 
 /// Sets up its stack while its view is being loaded.
-class SelfMade : public NavigationController {
-public:
-    explicit SelfMade(std::shared_ptr<ViewController> first)
-        : _first(std::move(first))
-    {
-    }
+struct SelfMade : NavigationController {
     void viewDidLoad() override
     {
-        setViewControllers({_first}, false);
+        setViewControllers({first}, false);
         NavigationController::viewDidLoad();
     }
-
-private:
-    std::shared_ptr<ViewController> _first;
+    std::shared_ptr<ViewController> first;
 };
 
 } // namespace
 
 TEST_F(Screens, OfAStackMadeWhileLoadingAppearOnce)
 {
-    navigation = std::make_shared<SelfMade>(screen("a"));
+    const auto selfMade = std::make_shared<SelfMade>();
+    selfMade->first = screen("a");
+    navigation = selfMade;
     show();
     window->layoutIfNeeded();
     EXPECT_EQ(
@@ -272,133 +274,26 @@ TEST_F(Screens, OnlyAFullScreenHidesTheOneBelow)
         take(), (Events{"full will go, orphaned", "list will appear", "full did go", "list did appear"}));
 }
 
-namespace {
-
-struct Question {
-    std::shared_ptr<AlertController> alert;
-    std::shared_ptr<AlertAction> accept;
-    Events answers;
-};
-
-std::shared_ptr<Question> ask(AlertActionStyle cancelStyle)
-{
-    const auto question = std::make_shared<Question>();
-    const auto note = [question = question.get()](const std::shared_ptr<AlertAction>& action) {
-        question->answers.push_back(action->title());
-    };
-    question->alert = std::make_shared<AlertController>("Title", "Message", AlertStyle::Alert);
-    question->accept = std::make_shared<AlertAction>("Create", AlertActionStyle::Default, note);
-    question->alert->addAction(std::make_shared<AlertAction>("Cancel", cancelStyle, note));
-    question->alert->addAction(question->accept);
-    return question;
-}
-
-} // namespace
-
-TEST_F(Screens, AnAlertStaysUntilItMayClose)
-{
-    navigation->setViewControllers({screen("list")}, false);
-    show();
-    const auto question = ask(AlertActionStyle::Default);
-    bool mayClose = false;
-    question->accept->setShouldClose([&] { return mayClose; });
-    question->accept->setEnabled(false);
-    TextField* field = nullptr;
-    question->alert->addTextField([&](TextField& made) { field = &made; });
-    navigation->presentViewController(question->alert, true);
-    EXPECT_TRUE(field->isEditing());
-    EXPECT_FALSE(question->alert->press(1));
-    question->accept->setEnabled(true);
-    EXPECT_FALSE(question->alert->press(1));
-    // The alert has neither an action in the cancel style nor an escape action, so Escape does nothing.
-    EXPECT_TRUE(window->backRequested());
-    EXPECT_EQ(navigation->presentedViewController(), question->alert);
-    mayClose = true;
-    EXPECT_TRUE(question->alert->press(1));
-    EXPECT_EQ(question->answers, Events{"Create"});
-    EXPECT_EQ(navigation->presentedViewController(), nullptr);
-    EXPECT_FALSE(field->isEditing());
-    EXPECT_FALSE(question->alert->press(7));
-}
-
 TEST_F(Screens, AnAlertAnswersOnceAfterItHasGone)
 {
     const auto host = std::make_shared<SlowHost>();
     navigation->setViewControllers({screen("list")}, false);
     show();
     window->setObserver(host);
-    const auto question = ask(AlertActionStyle::Cancel);
-    navigation->presentViewController(question->alert, true);
+    take();
+    const auto first = question(), next = question();
+    navigation->presentViewController(first, true);
     host->tokens.back().finish();
-    question->alert->userCancelled();
-    EXPECT_FALSE(question->alert->press(1));
-    EXPECT_TRUE(question->answers.empty());
+    first->userCancelled();
+    EXPECT_FALSE(first->press(1));
+    EXPECT_TRUE(take().empty());
 
     // Presenting the next alert first delivers what the first one left pending.
-    const auto next = ask(AlertActionStyle::Cancel);
-    navigation->presentViewController(next->alert, true);
-    EXPECT_EQ(question->answers, Events{"Cancel"});
-    EXPECT_EQ(navigation->presentedViewController(), next->alert);
+    navigation->presentViewController(next, true);
+    EXPECT_EQ(take(), Events{"Cancel"});
+    EXPECT_EQ(navigation->presentedViewController(), next);
     host->tokens[1].finish();
-    EXPECT_EQ(question->answers.size(), 1);
-}
-
-TEST_F(Screens, AChainOfAlertsFromHandlersIsShown)
-{
-    navigation->setViewControllers({screen("list")}, false);
-    show();
-    const auto second = ask(AlertActionStyle::Cancel);
-    const auto first = std::make_shared<AlertController>("First", "", AlertStyle::ActionSheet);
-    first->addAction(std::make_shared<AlertAction>("Next", AlertActionStyle::Destructive,
-        [&](const auto&) { navigation->presentViewController(second->alert, true); }));
-    navigation->presentViewController(first, true);
-    EXPECT_TRUE(first->press(0));
-    EXPECT_EQ(navigation->presentedViewController(), second->alert);
-    EXPECT_EQ(second->alert->presentingViewController(), navigation);
-    EXPECT_EQ(window->presentedScreens().size(), 1);
-}
-
-namespace {
-
-class Turning : public ViewController {
-public:
-    void viewWillTransitionToSizeWithTransitionCoordinator(
-        Size size, TransitionCoordinator& coordinator) override
-    {
-        ViewController::viewWillTransitionToSizeWithTransitionCoordinator(size, coordinator);
-        wide = size.width > size.height;
-        widthBefore = view()->frame().width;
-        coordinator.animateAlongside([this] { ++alongside; });
-    }
-    void traitsDidChange(const TraitCollection& previous) override { before = previous; }
-
-    bool wide = false;
-    double widthBefore = 0;
-    int alongside = 0;
-    std::optional<TraitCollection> before;
-};
-
-} // namespace
-
-TEST_F(Screens, AreToldOfANewSizeBeforeItApplies)
-{
-    const auto turning = std::make_shared<Turning>();
-    navigation->setViewControllers({turning}, false);
-    show();
-    window->layoutIfNeeded();
-    TraitCollection wide;
-    wide.horizontalSizeClass = SizeClass::Regular;
-    window->resized({640, 360}, wide);
-    window->layoutIfNeeded();
-    EXPECT_TRUE(turning->wide);
-    EXPECT_EQ(turning->widthBefore, 360);
-    EXPECT_EQ(turning->alongside, 1);
-    EXPECT_EQ(turning->view()->frame().width, 640);
-    EXPECT_EQ(turning->traits(), wide);
-    EXPECT_EQ(turning->before, TraitCollection());
-    EXPECT_EQ(window->interfaceOrientation(), InterfaceOrientation::LandscapeLeft);
-    window->resized({640, 360}, wide);
-    EXPECT_EQ(turning->alongside, 1);
+    EXPECT_TRUE(take().empty());
 }
 
 namespace {
