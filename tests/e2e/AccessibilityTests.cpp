@@ -37,7 +37,7 @@ protected:
     }
     void expectNamesOnce(const std::string& shown)
     {
-        EXPECT_TRUE(eventually([&] { return program->shows(shown); })) << shown;
+        expectShown(shown);
         expectNames(shown);
     }
     void expectNamesInMenuEntry(const std::string& row, const std::string& entry, const std::string& shown)

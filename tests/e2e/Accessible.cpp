@@ -10,69 +10,68 @@ namespace e2e {
 namespace {
 
 constexpr int mostChildren = 40;
-constexpr guint patience = 20'000, pause = 50; ///< milliseconds
+constexpr gint64 patience = 20'000'000; ///< microseconds
+constexpr guint pause = 50; ///< milliseconds
+
+struct Unref {
+    void operator()(gpointer held) const { g_object_unref(held); }
+};
+
+/// Holds an interface of a node, or null when the node has none.
+template <typename Interface>
+using Held = std::unique_ptr<Interface, Unref>;
+
+/// Frees a text and answers its content.
+std::string taken(char* text)
+{
+    std::string answer = text ? text : "";
+    g_free(text);
+    return answer;
+}
 
 } // namespace
 
 Accessible::Accessible(AtspiAccessible* node)
-    : _node(node, [](AtspiAccessible* held) {
-        if (held)
-            g_object_unref(held);
-    })
 {
-    if (!node)
-        _node.reset();
+    if (node)
+        _node.reset(node, Unref());
 }
 
 std::string Accessible::name() const
 {
-    char* text = atspi_accessible_get_name(_node.get(), nullptr);
-    std::string answer = text ? text : "";
-    g_free(text);
-    return answer;
+    return taken(atspi_accessible_get_name(_node.get(), nullptr));
 }
 
 std::string Accessible::roleName() const
 {
-    char* text = atspi_accessible_get_role_name(_node.get(), nullptr);
-    std::string answer = text ? text : "";
-    g_free(text);
-    return answer;
+    return taken(atspi_accessible_get_role_name(_node.get(), nullptr));
 }
 
 bool Accessible::hasState(AtspiStateType state) const
 {
-    auto* states = atspi_accessible_get_state_set(_node.get());
-    const bool has = states && atspi_state_set_contains(states, state);
-    if (states)
-        g_object_unref(states);
-    return has;
+    const Held<AtspiStateSet> states(atspi_accessible_get_state_set(_node.get()));
+    return states && atspi_state_set_contains(states.get(), state);
 }
 
 std::string Accessible::text() const
 {
-    auto* content = atspi_accessible_get_text_iface(_node.get());
+    const Held<AtspiText> content(atspi_accessible_get_text_iface(_node.get()));
     if (!content)
         return {};
-    const int length = atspi_text_get_character_count(content, nullptr);
-    char* text = atspi_text_get_text(content, 0, length, nullptr);
-    std::string answer = text ? text : "";
-    g_free(text);
-    g_object_unref(content);
-    return answer;
+    const int length = atspi_text_get_character_count(content.get(), nullptr);
+    return taken(atspi_text_get_text(content.get(), 0, length, nullptr));
 }
 
 Place Accessible::middle() const
 {
-    auto* component = atspi_accessible_get_component_iface(_node.get());
+    const Held<AtspiComponent> component(atspi_accessible_get_component_iface(_node.get()));
     if (!component)
         return {};
-    auto* extents = atspi_component_get_extents(component, ATSPI_COORD_TYPE_WINDOW, nullptr);
+    auto* extents = atspi_component_get_extents(component.get(), ATSPI_COORD_TYPE_WINDOW, nullptr);
     Place answer;
     if (extents)
         answer = {extents->x + extents->width / 2.0, extents->y + extents->height / 2.0};
     g_free(extents);
-    g_object_unref(component);
     return answer;
 }
 
@@ -81,57 +80,21 @@ bool Accessible::hasRole(AtspiRole role) const
     return atspi_accessible_get_role(_node.get(), nullptr) == role;
 }
 
-bool Accessible::isButton() const
-{
-    return hasRole(ATSPI_ROLE_PUSH_BUTTON);
-}
-
-bool Accessible::isEntry() const
-{
-    const auto role = atspi_accessible_get_role(_node.get(), nullptr);
-    return role == ATSPI_ROLE_ENTRY || role == ATSPI_ROLE_TEXT;
-}
-
-bool Accessible::isDialog() const
-{
-    return hasRole(ATSPI_ROLE_DIALOG);
-}
-
 bool Accessible::enter(const std::string& text) const
 {
-    auto* editable = atspi_accessible_get_editable_text_iface(_node.get());
-    if (!editable)
-        return false;
-    const bool done = atspi_editable_text_set_text_contents(editable, text.c_str(), nullptr);
-    g_object_unref(editable);
-    return done;
-}
-
-bool Accessible::press() const
-{
-    auto* action = atspi_accessible_get_action_iface(_node.get());
-    if (!action)
-        return false;
-    const bool done =
-        atspi_action_get_n_actions(action, nullptr) > 0 && atspi_action_do_action(action, 0, nullptr);
-    g_object_unref(action);
-    return done;
+    const Held<AtspiEditableText> entry(atspi_accessible_get_editable_text_iface(_node.get()));
+    return entry && atspi_editable_text_set_text_contents(entry.get(), text.c_str(), nullptr);
 }
 
 bool Accessible::perform(const std::string& action) const
 {
-    auto* actions = atspi_accessible_get_action_iface(_node.get());
-    if (!actions)
-        return false;
-    bool done = false;
-    const int count = atspi_action_get_n_actions(actions, nullptr);
-    for (int i = 0; i < count && !done; ++i) {
-        char* name = atspi_action_get_action_name(actions, i, nullptr);
-        done = name && action == name && atspi_action_do_action(actions, i, nullptr);
-        g_free(name);
+    const Held<AtspiAction> actions(atspi_accessible_get_action_iface(_node.get()));
+    const int count = actions ? atspi_action_get_n_actions(actions.get(), nullptr) : 0;
+    for (int i = 0; i < count; ++i) {
+        if (action.empty() || taken(atspi_action_get_action_name(actions.get(), i, nullptr)) == action)
+            return atspi_action_do_action(actions.get(), i, nullptr);
     }
-    g_object_unref(actions);
-    return done;
+    return false;
 }
 
 void Accessible::collect(
@@ -171,23 +134,15 @@ Accessible Accessible::application(const std::string& program, pid_t process)
 
 bool Accessible::waitFor(const std::function<bool()>& condition)
 {
-    bool isLate = false;
-    const guint alarm = g_timeout_add(
-        patience,
-        [](gpointer late) -> gboolean {
-            *static_cast<bool*>(late) = true;
-            return G_SOURCE_CONTINUE;
-        },
-        &isLate);
+    const auto deadline = g_get_monotonic_time() + patience;
     // The accessibility tree sends no notice of its own, so it is read again at each tick.
     const guint tick = g_timeout_add(
         pause, [](gpointer) -> gboolean { return G_SOURCE_CONTINUE; }, nullptr);
     bool holds = condition();
-    while (!holds && !isLate) {
+    while (!holds && g_get_monotonic_time() < deadline) {
         g_main_context_iteration(nullptr, TRUE);
         holds = condition();
     }
-    g_source_remove(alarm);
     g_source_remove(tick);
     return holds;
 }

@@ -30,15 +30,15 @@ public:
     /// Answers whether the node existed at the last look and is visible.
     bool isVisible() const { return hasState(ATSPI_STATE_VISIBLE); }
     /// Performs the first action of the node. Answers false when it has none.
-    bool press() const;
+    bool press() const { return perform({}); }
     /// Performs the action of this name. Answers false when there is none.
     bool perform(const std::string& action) const;
     /// Answers all visible nodes below that match, in the order of the tree. Of a long list only the first
     /// rows are searched.
     std::vector<Accessible> all(const std::function<bool(const Accessible&)>& matches) const;
-    bool isButton() const;
-    bool isEntry() const;
-    bool isDialog() const;
+    bool isButton() const { return hasRole(ATSPI_ROLE_PUSH_BUTTON); }
+    bool isEntry() const { return hasRole(ATSPI_ROLE_ENTRY) || hasRole(ATSPI_ROLE_TEXT); }
+    bool isDialog() const { return hasRole(ATSPI_ROLE_DIALOG); }
     bool hasRole(AtspiRole role) const;
     /// Answers whether the node has the keyboard focus.
     bool isFocused() const { return hasState(ATSPI_STATE_FOCUSED); }

@@ -57,6 +57,15 @@ protected:
         return ::testing::AssertionFailure() << (program ? program->state() : "nothing runs");
     }
 
+    void expectShown(const std::string& beginning) const
+    {
+        EXPECT_TRUE(eventually([&] { return program->shows(beginning); })) << beginning;
+    }
+    void expectGone(const std::string& beginning) const
+    {
+        EXPECT_TRUE(eventually([&] { return !program->shows(beginning); })) << beginning;
+    }
+
     std::filesystem::path home, documents, top;
     Program::Environment environment;
     std::optional<Program> program;

@@ -57,7 +57,7 @@ TEST_F(PreviewTests, PicturesAndPagesSayWhatTheyAre)
     program->press("Biscuit the cat.png");
     EXPECT_TRUE(eventually([&] { return isShown(ATSPI_ROLE_IMAGE, "Biscuit the cat.png"); }));
     program->press("Back");
-    EXPECT_TRUE(eventually([this] { return program->shows("Winter hike"); }));
+    expectShown("Winter hike");
     program->press("Back");
     program->press("Documents");
     program->press("Tickets");

@@ -8,13 +8,10 @@
 #include <algorithm>
 #include <cstdlib>
 #include <deque>
-#include <fcntl.h>
 #include <fstream>
 #include <iterator>
 #include <regex>
 #include <signal.h>
-#include <spawn.h>
-#include <sys/wait.h>
 
 namespace e2e {
 
@@ -29,55 +26,36 @@ bool begins(const std::string& text, const std::string& beginning)
     return text.compare(0, beginning.size(), beginning) == 0;
 }
 
-std::vector<std::string> changed(const Program::Environment& changes)
+/// Starts a command with a changed environment. What it writes to its standard error goes to a file, unless
+/// the name of that is empty.
+std::shared_ptr<GSubprocess> spawn(
+    const std::vector<std::string>& command, const Program::Environment& changes, const std::string& errors)
 {
-    auto all = changes;
-    for (char** entry = environ; *entry; ++entry) {
-        const std::string text = *entry;
-        const auto equals = text.find('=');
-        all.emplace(text.substr(0, equals), text.substr(equals + 1));
-    }
-    std::vector<std::string> answer;
-    for (const auto& [name, value] : all)
-        answer.push_back(name + '=' + value);
-    return answer;
-}
-
-std::vector<char*> pointers(std::vector<std::string>& texts)
-{
-    std::vector<char*> answer;
-    for (auto& text : texts)
-        answer.push_back(text.data());
-    answer.push_back(nullptr);
-    return answer;
+    const std::shared_ptr<GSubprocessLauncher> launcher(
+        g_subprocess_launcher_new(G_SUBPROCESS_FLAGS_NONE), g_object_unref);
+    for (const auto& [name, value] : changes)
+        g_subprocess_launcher_setenv(launcher.get(), name.c_str(), value.c_str(), TRUE);
+    if (!errors.empty())
+        g_subprocess_launcher_set_stderr_file_path(launcher.get(), errors.c_str());
+    std::vector<const char*> words;
+    for (const auto& word : command)
+        words.push_back(word.c_str());
+    words.push_back(nullptr);
+    auto* process = g_subprocess_launcher_spawnv(launcher.get(), words.data(), nullptr);
+    if (process)
+        return {process, g_object_unref};
+    ADD_FAILURE() << "cannot start " << command.front();
+    return nullptr;
 }
 
 } // namespace
 
-pid_t Program::spawn(
-    const std::vector<std::string>& command, const Environment& changes, const std::string& errors)
-{
-    auto words = command;
-    auto environment = changed(changes);
-    posix_spawn_file_actions_t actions;
-    posix_spawn_file_actions_init(&actions);
-    if (!errors.empty())
-        posix_spawn_file_actions_addopen(&actions, 2, errors.c_str(), O_WRONLY | O_CREAT | O_TRUNC, 0600);
-    pid_t process = -1;
-    EXPECT_EQ(posix_spawn(&process, command.front().c_str(), &actions, nullptr, pointers(words).data(),
-                  pointers(environment).data()),
-        0)
-        << command.front();
-    posix_spawn_file_actions_destroy(&actions);
-    return process;
-}
-
 int Program::run(const std::vector<std::string>& command, const Environment& changes)
 {
     const auto process = spawn(command, changes, {});
-    int status = -1;
-    return process > 0 && waitpid(process, &status, 0) == process && WIFEXITED(status) ? WEXITSTATUS(status)
-                                                                                       : -1;
+    const bool hasEnded = process && g_subprocess_wait(process.get(), nullptr, nullptr)
+        && g_subprocess_get_if_exited(process.get());
+    return hasEnded ? g_subprocess_get_exit_status(process.get()) : -1;
 }
 
 Program::Program(const Environment& changes)
@@ -88,14 +66,15 @@ Program::Program(const Environment& changes)
     // The first look starts the accessibility registry, which might not see a program that started before it.
     atspi_accessible_get_child_count(atspi_get_desktop(0), nullptr);
     _process = spawn({getenv("TRW_PROGRAM")}, changes, _errors);
-    EXPECT_TRUE(Accessible::waitFor([this] {
-        return bool(_tree = Accessible::application("tarrow-drive", _process));
+    EXPECT_TRUE(_process && Accessible::waitFor([this] {
+        const char* number = g_subprocess_get_identifier(_process.get());
+        return number && (_tree = Accessible::application("tarrow-drive", std::atoi(number)));
     })) << "the program did not come up";
 }
 
 Program::~Program()
 {
-    if (_process > 0)
+    if (_process)
         expectOrderlyEnd();
     std::ifstream errors(_errors);
     const std::regex complaint("(Gtk|Gdk|Gsk|Adwaita|GLib|GLib-GObject|GLib-GIO|Pango|GtkSourceView|Poppler)-"
@@ -106,12 +85,10 @@ Program::~Program()
 
 void Program::expectOrderlyEnd()
 {
-    kill(_process, SIGTERM);
-    int status = 0;
-    EXPECT_TRUE(Accessible::waitFor([&] { return waitpid(_process, &status, WNOHANG) == _process; }));
+    g_subprocess_send_signal(_process.get(), SIGTERM);
+    EXPECT_TRUE(Accessible::waitFor([this] { return !g_subprocess_get_identifier(_process.get()); }));
     std::ifstream errors(_errors);
-    EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0)
-        << status << '\n'
+    EXPECT_TRUE(g_subprocess_get_successful(_process.get()))
         << std::string(std::istreambuf_iterator<char>(errors), {});
 }
 
@@ -157,16 +134,6 @@ std::string Program::state() const
     for (const auto& line : last)
         answer += '\n' + line;
     return answer;
-}
-
-std::vector<Accessible> Program::entries() const
-{
-    return all([](const Accessible& node) { return node.isEntry(); });
-}
-
-std::vector<Accessible> Program::dialogs() const
-{
-    return all([](const Accessible& node) { return node.isDialog(); });
 }
 
 void Program::press(const std::string& beginning) const

@@ -5,9 +5,10 @@
 
 #include "Accessible.h"
 
+#include <gio/gio.h>
+
 #include <map>
 #include <string>
-#include <sys/types.h>
 #include <vector>
 
 namespace e2e {
@@ -35,10 +36,10 @@ public:
     bool hasKeyboardAt(const std::string& beginning) const;
     /// Answers the texts that a preview shows; empty when it shows none.
     std::string document() const;
-    std::vector<Accessible> entries() const;
+    std::vector<Accessible> entries() const { return all(&Accessible::isEntry); }
     /// Answers the names of all visible nodes and the end of the log, for the message of a failed test.
     std::string state() const;
-    std::vector<Accessible> dialogs() const;
+    std::vector<Accessible> dialogs() const { return all(&Accessible::isDialog); }
 
     /// Presses the frontmost button whose name begins so, as soon as it exists.
     void press(const std::string& beginning) const;
@@ -50,12 +51,10 @@ public:
     static int run(const std::vector<std::string>& command, const Environment& changes = {});
 
 private:
-    static pid_t spawn(
-        const std::vector<std::string>& command, const Environment& changes, const std::string& errors);
     void expectOrderlyEnd();
 
     std::string _errors; ///< the file with what the program writes
-    pid_t _process = -1;
+    std::shared_ptr<GSubprocess> _process;
     Accessible _tree;
 };
 

@@ -3,13 +3,14 @@
 
 #include "TouchScreen.h"
 
-#include <glib.h>
 #include <gtest/gtest.h>
 #include <xorg/xf86-input-inputtest-protocol.h>
 
 #include <algorithm>
+#include <chrono>
 #include <sys/socket.h>
 #include <sys/un.h>
+#include <thread>
 #include <unistd.h>
 
 namespace e2e {
@@ -39,16 +40,7 @@ bool read(int socket)
 /// Waits in real time, because the program measures the times of touches.
 void pass(int milliseconds)
 {
-    bool isOver = false;
-    g_timeout_add(
-        static_cast<guint>(milliseconds),
-        [](gpointer over) -> gboolean {
-            *static_cast<bool*>(over) = true;
-            return G_SOURCE_REMOVE;
-        },
-        &isOver);
-    while (!isOver)
-        g_main_context_iteration(nullptr, TRUE);
+    std::this_thread::sleep_for(std::chrono::milliseconds(milliseconds));
 }
 
 } // namespace

@@ -24,7 +24,7 @@ protected:
         environment["DISPLAY"] = getenv("TRW_TOUCH_DISPLAY");
         ASSERT_TRUE(screen().isConnected());
         start();
-        EXPECT_TRUE(eventually([this] { return program->shows("Documents"); }));
+        expectShown("Documents");
     }
     void TearDown() override
     {
@@ -51,14 +51,6 @@ protected:
         return place;
     }
     void tap(const std::string& beginning) { screen().tap(placeOf(beginning)); }
-    void expectShown(const std::string& beginning)
-    {
-        EXPECT_TRUE(eventually([&] { return program->shows(beginning); })) << beginning;
-    }
-    void expectGone(const std::string& beginning)
-    {
-        EXPECT_TRUE(eventually([&] { return !program->shows(beginning); })) << beginning;
-    }
 };
 
 TEST_F(TouchTests, AFingerThatMovesOpensNothingAndASwipeGoesBack)
@@ -84,7 +76,7 @@ TEST_F(TouchTests, AFingerThatMovesOpensNothingAndASwipeGoesBack)
     EXPECT_EQ(placeOf("Letters").x, x);
     screen().drag({{x - 100, y}, {x + 150, y}});
     expectShown("Notebook");
-    EXPECT_TRUE(eventually([this] { return !program->shows("Back"); }));
+    expectGone("Back");
 }
 
 TEST_F(TouchTests, AHeldFingerPeeksAndPressesOn)
