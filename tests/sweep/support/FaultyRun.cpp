@@ -20,7 +20,6 @@
 
 #include <algorithm>
 #include <array>
-#include <cerrno>
 #include <csignal>
 #include <span>
 #include <stdexcept>
