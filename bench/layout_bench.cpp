@@ -69,7 +69,7 @@ BENCHMARK(firstLayout)->Unit(benchmark::kMicrosecond);
 /// The floor: the same number of views, whose frames are computed by hand.
 void placedByHand(benchmark::State& state)
 {
-    Form form;
+    const Form form;
     double width = 360;
     for (auto _ : state) {
         width = width == 360 ? 400 : 360;
@@ -84,7 +84,7 @@ BENCHMARK(placedByHand)->Unit(benchmark::kMicrosecond);
 
 void anotherWindowSize(benchmark::State& state)
 {
-    Form form;
+    const Form form;
     double width = 360;
     for (auto _ : state) {
         width = width == 360 ? 400 : 360;
@@ -96,7 +96,7 @@ BENCHMARK(anotherWindowSize)->Unit(benchmark::kMicrosecond);
 
 void anotherConstant(benchmark::State& state)
 {
-    Form form;
+    const Form form;
     for (auto _ : state) {
         form.top->setConstant(form.top->constant() == 10 ? 60 : 10);
         form.root->layoutIfNeeded();
@@ -106,7 +106,7 @@ BENCHMARK(anotherConstant)->Unit(benchmark::kMicrosecond);
 
 void anotherText(benchmark::State& state)
 {
-    Form form;
+    const Form form;
     bool isLong = false;
     for (auto _ : state) {
         isLong = !isLong;

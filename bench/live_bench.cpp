@@ -219,7 +219,7 @@ void filesArrive(benchmark::State& state)
         const TurnMeter meter;
         std::atomic<double> madeIn = 0;
         const auto began = Clock::now();
-        std::jthread maker([&] {
+        const std::jthread maker([&] {
             for (int i = 0; i < arrivals; ++i)
                 makeFile(name(i));
             madeIn = milliseconds(Clock::now() - began);

@@ -61,6 +61,7 @@ struct Report {
 
 } // namespace
 
+// NOLINTNEXTLINE(readability-inconsistent-declaration-parameter-name): names of the library
 extern "C" int poll(pollfd* descriptors, nfds_t count, int timeout)
 {
     using Poll = int (*)(pollfd*, nfds_t, int);

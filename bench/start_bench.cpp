@@ -20,8 +20,6 @@
 #include <unistd.h>
 #include <vector>
 
-extern char** environ;
-
 namespace {
 
 bool readUntilMarker(int descriptor)

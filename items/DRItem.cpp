@@ -6,6 +6,7 @@
 #include "platform/Localization.h"
 
 #include <stdexcept>
+#include <utility>
 
 namespace tarrow {
 
@@ -33,8 +34,8 @@ std::shared_ptr<DRItem> DRItem::init()
     throw std::invalid_argument(platform::formatText("Don't call %@.", {"-[DRItem init]"}));
 }
 
-DRItem::DRItem(Token, const Url& url)
-    : _url(url)
+DRItem::DRItem(Token, Url url)
+    : _url(std::move(url))
 {
 }
 

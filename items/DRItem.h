@@ -32,7 +32,7 @@ public:
     static std::shared_ptr<DRItem> initWithURL(const Url& url);
     /// Always throws std::invalid_argument, because a record needs a URL.
     [[noreturn]] static std::shared_ptr<DRItem> init();
-    DRItem(Token, const Url& url);
+    DRItem(Token, Url url);
 
     /// The location for which the record was built. Setting an equal one changes nothing; setting another one
     /// reads the record again.

@@ -33,6 +33,7 @@ std::vector<std::optional<std::string>> declaredContentTypes(const DocumentConta
 bool accepts(const DocumentContainer& container, const std::string& extension, const std::string& type)
 {
     static constexpr Operation op{"+[FileUtils isValidExtensionForContainer:]"};
+    // NOLINTNEXTLINE(readability-use-anyofallof): the loop also logs what it meets
     for (const auto& declared : declaredContentTypes(container)) {
         if (!declared) {
             op.error("Expected array of strings");

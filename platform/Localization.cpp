@@ -56,9 +56,9 @@ double leadingNumber(const std::vector<TextArgument>& arguments)
 {
     if (arguments.empty())
         return 0;
-    if (const auto* integer = std::get_if<std::int64_t>(&arguments[0]))
+    if (const auto* integer = std::get_if<std::int64_t>(&arguments.front()))
         return static_cast<double>(*integer);
-    const auto* real = std::get_if<double>(&arguments[0]);
+    const auto* real = std::get_if<double>(&arguments.front());
     return real ? *real : 0;
 }
 

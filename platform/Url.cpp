@@ -79,7 +79,7 @@ std::optional<std::vector<QueryItem>> parseQuery(std::string_view text)
         auto value = percentDecoded(pair);
         if (!name || !value)
             return std::nullopt;
-        items.push_back({std::move(*name), hasValue ? std::optional(std::move(*value)) : std::nullopt});
+        items.push_back({std::move(*name), hasValue ? std::move(value) : std::nullopt});
     }
     return items;
 }

@@ -46,7 +46,8 @@ std::string displayName(std::string_view bytes)
 {
     std::string shown;
     shown.reserve(bytes.size());
-    if (isValidUtf8(bytes) && bytes.find(embeddings) == bytes.npos && bytes.find(isolates) == bytes.npos) {
+    if (isValidUtf8(bytes) && bytes.find(embeddings) == std::string_view::npos
+        && bytes.find(isolates) == std::string_view::npos) {
         shown = bytes;
     } else {
         while (!bytes.empty()) {
@@ -56,7 +57,7 @@ std::string displayName(std::string_view bytes)
             bytes.remove_prefix(std::max<std::size_t>(length, 1));
         }
     }
-    std::replace_if(shown.begin(), shown.end(), isControl, ' ');
+    std::ranges::replace_if(shown, isControl, ' ');
     return shown;
 }
 

@@ -60,7 +60,7 @@ bool isUsableName(const std::string& name)
 {
     const auto isControl = [](unsigned char c) { return c < 0x20 || c == 0x7f; };
     return !name.empty() && name.size() <= longestName && platform::isValidUtf8(name)
-        && std::find_if(name.begin(), name.end(), isControl) == name.end();
+        && std::ranges::none_of(name, isControl);
 }
 
 int signIn(const DriveLayout& wanted, const std::string& name)

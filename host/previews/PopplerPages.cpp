@@ -194,6 +194,7 @@ Result<Image> PopplerPages::renderPage(std::size_t index, double pixelsPerPoint,
             return pagesError(PagesErrorCode::Damaged);
         std::vector<std::uint32_t> pixels(static_cast<std::size_t>(width) * static_cast<std::size_t>(height));
         draw(*drawn, {width, height, pixelsPerPoint, part.origin()}, pixels);
+        // NOLINTNEXTLINE(readability-suspicious-call-argument): pixels per point are the scale
         return Image::fromPixels(width, height, pixelsPerPoint, std::move(pixels));
     });
 }

@@ -38,12 +38,13 @@ public:
     explicit PopplerPages(Object<PopplerDocument> document);
 
     std::size_t pageCount() const override { return _count; }
-    platform::Size pageSize(std::size_t page) const override;
+    platform::Size pageSize(std::size_t index) const override;
     platform::Result<platform::Image> renderPage(
-        std::size_t page, double pixelsPerPoint, const platform::Rect& part) const override;
-    std::vector<platform::Rect> find(std::size_t page, const std::string& text) const override;
-    platform::PageText textBetween(std::size_t page, platform::Point from, platform::Point to) const override;
-    std::vector<platform::PageMark> marks(std::size_t page) const override;
+        std::size_t index, double pixelsPerPoint, const platform::Rect& part) const override;
+    std::vector<platform::Rect> find(std::size_t index, const std::string& text) const override;
+    platform::PageText textBetween(
+        std::size_t index, platform::Point from, platform::Point to) const override;
+    std::vector<platform::PageMark> marks(std::size_t index) const override;
     platform::PagesRights rights() const override;
 
     /// Runs a call with the document, which no other thread uses meanwhile. Answers the call's answer.

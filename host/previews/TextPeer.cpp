@@ -20,7 +20,6 @@ using gtk::ObjectRef;
 using gtk::PreviewPeer;
 using screens::MatchStep;
 using screens::PreviewTextView;
-using screens::PreviewView;
 
 namespace {
 
@@ -67,7 +66,6 @@ TextPeer::TextPeer(const std::shared_ptr<PreviewTextView>& view)
     , _buffer(ObjectRef<GtkSourceBuffer>::adopt(gtk_source_buffer_new(nullptr)))
     , _style(ObjectRef<GtkCssProvider>::adopt(gtk_css_provider_new()))
     , _text(gtk_source_view_new_with_buffer(_buffer.get()))
-    , _marked(nullptr)
 {
     build();
 }

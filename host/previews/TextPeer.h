@@ -51,7 +51,7 @@ private:
     gtk::ObjectRef<GtkSourceLanguage> _language;
     gtk::ObjectRef<GtkCssProvider> _style;
     GtkWidget* _text;
-    GtkTextTag* _marked; ///< belongs to the buffer; marks the current match
+    GtkTextTag* _marked = nullptr; ///< belongs to the buffer; marks the current match
     std::string _shown; ///< the text that the buffer has or will have
     std::size_t _inserted = 0,
                 _insertEnd = 0; ///< range of bytes of `_shown` that the buffer does not have yet

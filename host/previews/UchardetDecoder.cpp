@@ -69,6 +69,7 @@ using Converter = std::unique_ptr<std::remove_pointer_t<GIConv>, CloseConverter>
 Converter converterFrom(const std::string& encoding)
 {
     auto* opened = g_iconv_open("UTF-8", encoding.c_str());
+    // NOLINTNEXTLINE(performance-no-int-to-ptr): the library says so that it knows no such encoding
     return Converter(opened == reinterpret_cast<GIConv>(-1) ? nullptr : opened);
 }
 

@@ -47,8 +47,8 @@ std::shared_ptr<AlertAction> AlertController::escapeAction() const
 {
     if (_escapeAction)
         return _escapeAction;
-    const auto cancel = std::find_if(_actions.begin(), _actions.end(),
-        [](const auto& action) { return action->style() == AlertActionStyle::Cancel; });
+    const auto cancel = std::ranges::find_if(
+        _actions, [](const auto& action) { return action->style() == AlertActionStyle::Cancel; });
     if (cancel != _actions.end())
         return *cancel;
     return _actions.size() == 1 ? _actions.front() : nullptr;
@@ -117,8 +117,9 @@ bool AlertController::press(const std::shared_ptr<AlertAction>& pressed)
 {
     // The functions that are asked here belong to the caller and may release the alert.
     const auto self = std::static_pointer_cast<AlertController>(shared_from_this());
+    // NOLINTNEXTLINE(performance-unnecessary-copy-initialization): the alert may own what is referred to
     const auto action = pressed;
-    const bool isKnown = std::find(_actions.begin(), _actions.end(), action) != _actions.end();
+    const bool isKnown = std::ranges::find(_actions, action) != _actions.end();
     if (!isKnown || !action->isEnabled() || _isClosing || !action->mayClose())
         return false;
     if (!presentingViewController()) {

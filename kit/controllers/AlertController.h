@@ -55,7 +55,7 @@ public:
     /// The user pressed an action. Answers false when the action is disabled, is not one of this alert's, or
     /// refused to close.
     bool press(std::size_t actionIndex);
-    bool press(const std::shared_ptr<AlertAction>& action);
+    bool press(const std::shared_ptr<AlertAction>& pressed);
     /// The user pressed Escape or tapped beside the alert.
     void userCancelled() override;
 

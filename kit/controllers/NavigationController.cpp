@@ -45,7 +45,7 @@ void NavigationController::pushViewController(const std::shared_ptr<ViewControll
 {
     _transition.finish();
     auto screens = children();
-    if (!screen || std::find(screens.begin(), screens.end(), screen) != screens.end())
+    if (!screen || std::ranges::find(screens, screen) != screens.end())
         return;
     screens.push_back(screen);
     replaceStack(std::move(screens), NavigationKind::Push, animated);
@@ -83,8 +83,7 @@ void NavigationController::setViewControllers(Screens screens, bool animated)
     if (screens == before)
         return;
     // When the new top was in the stack before, the movement is one back to it.
-    const bool goesBack =
-        !screens.empty() && std::find(before.begin(), before.end(), screens.back()) != before.end();
+    const bool goesBack = !screens.empty() && std::ranges::find(before, screens.back()) != before.end();
     replaceStack(std::move(screens), goesBack ? NavigationKind::Pop : NavigationKind::Replace, animated);
 }
 
@@ -94,7 +93,7 @@ void NavigationController::adopt(Screens screens, const std::shared_ptr<ViewCont
 {
     const auto before = std::exchange(_children, std::move(screens));
     for (const auto& screen : before) {
-        const bool stays = std::find(_children.begin(), _children.end(), screen) != _children.end();
+        const bool stays = std::ranges::find(_children, screen) != _children.end();
         if (stays || screen == leaving)
             continue;
         screen->_parent.reset();
@@ -148,8 +147,7 @@ void NavigationController::endTransition(const NavigationTransition& transition)
         from->endAppearance();
         if (from->isViewLoaded() && from != topViewController())
             from->view()->removeFromSuperview();
-        if (std::find(_children.begin(), _children.end(), from) == _children.end()
-            && from->parent().get() == this) {
+        if (std::ranges::find(_children, from) == _children.end() && from->parent().get() == this) {
             from->_parent.reset();
             from->didMoveToParentViewController(nullptr);
         }

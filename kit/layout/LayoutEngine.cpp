@@ -293,8 +293,7 @@ void LayoutEngine::Impl::addAll()
     static constexpr Operation op{"-[LayoutEngine addAll]"};
     // Constraints of high priority are added first, because most of the others then find their optimum at
     // once.
-    std::stable_sort(additions.begin(), additions.end(),
-        [](const auto& a, const auto& b) { return a.priority > b.priority; });
+    std::ranges::stable_sort(additions, [](const auto& a, const auto& b) { return a.priority > b.priority; });
     for (const auto& addition : additions) {
         const auto& rule = addition.rule;
         *addition.id = solver.addConstraint(rule.terms, rule.relation, rule.constant, addition.priority);
@@ -314,7 +313,7 @@ void LayoutEngine::Impl::solve()
     static constexpr Operation op{"-[LayoutEngine solve]"};
     for (const auto givenUp : solver.solve()) {
         const auto isIt = [givenUp](const auto& entry) { return entry.second.id == givenUp; };
-        const auto active = std::find_if(rules.begin(), rules.end(), isIt);
+        const auto active = std::ranges::find_if(rules, isIt);
         if (active == rules.end())
             continue;
         active->second.id.reset();

@@ -140,7 +140,7 @@ void LayoutItem::deactivateCrossingBelow(const LayoutItem& part)
         return first && second && first->isInside(part) != second->isInside(part);
     };
     LayoutConstraints crossing;
-    std::copy_if(_constraints.begin(), _constraints.end(), std::back_inserter(crossing), crosses);
+    std::ranges::copy_if(_constraints, std::back_inserter(crossing), crosses);
     LayoutConstraint::deactivate(crossing);
     for (const auto& child : layoutChildren())
         child->deactivateCrossingBelow(part);

@@ -118,12 +118,12 @@ bool LayoutSolver::Impl::place(Stored& constraint)
         tableau.addEquation(std::move(row), *column);
         return true;
     }
-    const bool saysNothing = std::all_of(row.cells().begin(), row.cells().end(),
-        [this](const auto& cell) { return tableau.kind(cell.column) == Kind::Dummy; });
-    bool isPossible = true;
-    if (!saysNothing)
+    const bool saysNothing = std::ranges::all_of(
+        row.cells(), [this](const auto& cell) { return tableau.kind(cell.column) == Kind::Dummy; });
+    bool isPossible = !saysNothing || SparseRow::isNearZero(row.constant);
+    if (!saysNothing) {
         isPossible = tableau.addEquation(std::move(row));
-    else if ((isPossible = SparseRow::isNearZero(row.constant))) {
+    } else if (isPossible) {
         row.constant = 0;
         tableau.addEquation(std::move(row), constraint.marker);
     }
@@ -171,8 +171,8 @@ void LayoutSolver::Impl::rebuild()
         if (constraints[id].inUse)
             order.push_back(id);
     }
-    std::stable_sort(order.begin(), order.end(),
-        [this](auto a, auto b) { return constraints[a].priority() > constraints[b].priority(); });
+    std::ranges::stable_sort(
+        order, [this](auto a, auto b) { return constraints[a].priority() > constraints[b].priority(); });
     for (const auto id : order) {
         if (place(constraints[id]))
             continue;

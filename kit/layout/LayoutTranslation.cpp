@@ -41,10 +41,9 @@ LayoutRelation mirrored(LayoutRelation relation)
 bool LayoutRule::hasSameTerms(const LayoutRule& other) const
 {
     return relation == other.relation
-        && std::equal(terms.begin(), terms.end(), other.terms.begin(), other.terms.end(),
-            [](const auto& a, const auto& b) {
-                return a.variable == b.variable && a.coefficient == b.coefficient;
-            });
+        && std::ranges::equal(terms, other.terms, [](const auto& a, const auto& b) {
+               return a.variable == b.variable && a.coefficient == b.coefficient;
+           });
 }
 
 LayoutTranslation::LayoutTranslation(const LayoutItem& root, const Variables& variables)

@@ -77,8 +77,8 @@ void SimplexTableau::bringUpToDate(std::int32_t index)
     auto& row = _rows[index].row;
     const auto isBasic = [this](const auto& cell) { return _columns[cell.column].row != noRow; };
     const auto& cells = row.cells();
-    for (auto cell = std::find_if(cells.begin(), cells.end(), isBasic); cell != cells.end();
-         cell = std::find_if(cells.begin(), cells.end(), isBasic))
+    for (auto cell = std::ranges::find_if(cells, isBasic); cell != cells.end();
+         cell = std::ranges::find_if(cells, isBasic))
         substitute(index, cell->column, _rows[_columns[cell->column].row].row);
 }
 
@@ -221,8 +221,8 @@ bool SimplexTableau::addEquation(SparseRow row)
     if (index != noRow) {
         // Any column may take its place at 0. A row without columns says 0 = 0 and is dropped.
         const auto& cells = _rows[index].row.cells();
-        const auto entering = std::find_if(cells.begin(), cells.end(),
-            [this](const auto& cell) { return kind(cell.column) != Kind::Dummy; });
+        const auto entering = std::ranges::find_if(
+            cells, [this](const auto& cell) { return kind(cell.column) != Kind::Dummy; });
         if (entering != cells.end())
             pivot(index, entering->column);
         else if (!cells.empty())

@@ -81,14 +81,14 @@ private:
     const std::vector<std::int32_t>& restrictedRowsWith(Column column);
     const std::vector<std::int32_t>& freeRowsWith(Column column);
     std::vector<std::int32_t>& occurrences(Column column, std::int32_t row);
-    void bringUpToDate(std::int32_t row);
+    void bringUpToDate(std::int32_t index);
     std::int32_t insertRow(Column basic, SparseRow row);
     SparseRow removeRow(std::int32_t index);
-    void substitute(std::int32_t row, Column column, const SparseRow& replacement);
+    void substitute(std::int32_t index, Column column, const SparseRow& replacement);
     void substituteInRestrictedRows(Column column, const SparseRow& replacement);
     void substituteInFreeRows(Column column, const SparseRow& replacement);
     void substituteInCosts(Column column, const SparseRow& replacement);
-    void pivot(std::int32_t row, Column entering);
+    void pivot(std::int32_t index, Column entering);
     bool minimizeLevel(Levels::iterator level);
     std::optional<Column> enteringColumn(Levels::const_iterator level) const;
     std::int32_t leavingRow(Column entering);

@@ -9,8 +9,7 @@ namespace kit {
 
 std::vector<SparseRow::Cell>::iterator SparseRow::find(Column column)
 {
-    return std::lower_bound(_cells.begin(), _cells.end(), column,
-        [](const Cell& cell, Column wanted) { return cell.column < wanted; });
+    return std::ranges::lower_bound(_cells, column, {}, &Cell::column);
 }
 
 double SparseRow::coefficient(Column column) const

@@ -37,8 +37,8 @@ void keepLongestRise(std::vector<std::size_t>& old)
     for (std::size_t index = 0; index < old.size(); ++index) {
         if (old[index] == nowhere)
             continue;
-        const auto place = std::lower_bound(tails.begin(), tails.end(), old[index],
-            [&](std::size_t tail, std::size_t value) { return old[tail] < value; });
+        const auto place =
+            std::ranges::lower_bound(tails, old[index], {}, [&](std::size_t tail) { return old[tail]; });
         if (place != tails.begin())
             previous[index] = *(place - 1);
         if (place == tails.end())
@@ -89,7 +89,7 @@ std::vector<ListSplice> ListChanges::splicesExactWithin(const RowRange& range) c
 
 ListChanges ListChanges::between(std::span<const RowId> before, std::span<const RowId> after)
 {
-    const auto [oldEnd, newEnd] = std::mismatch(before.begin(), before.end(), after.begin(), after.end());
+    const auto [oldEnd, newEnd] = std::ranges::mismatch(before, after);
     const auto head = static_cast<std::size_t>(oldEnd - before.begin());
     before = before.subspan(head);
     after = after.subspan(head);

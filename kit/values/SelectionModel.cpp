@@ -43,10 +43,10 @@ void SelectionModel::selectAll(std::span<const RowId> order)
 
 void SelectionModel::extendTo(RowId id, std::span<const RowId> order)
 {
-    auto last = std::find(order.begin(), order.end(), id);
+    auto last = std::ranges::find(order, id);
     if (last == order.end())
         return;
-    auto first = _anchor ? std::find(order.begin(), order.end(), *_anchor) : order.end();
+    auto first = _anchor ? std::ranges::find(order, *_anchor) : order.end();
     if (first == order.end())
         return select(id);
     if (last < first)
@@ -87,8 +87,7 @@ bool SelectionModel::keepOnly(std::span<const RowId> order)
 std::vector<RowId> SelectionModel::inOrder(std::span<const RowId> order) const
 {
     std::vector<RowId> selected;
-    std::copy_if(
-        order.begin(), order.end(), std::back_inserter(selected), [this](RowId id) { return contains(id); });
+    std::ranges::copy_if(order, std::back_inserter(selected), [this](RowId id) { return contains(id); });
     return selected;
 }
 

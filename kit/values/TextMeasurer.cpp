@@ -13,7 +13,7 @@ namespace {
 std::size_t characterCount(std::string_view text)
 {
     return static_cast<std::size_t>(
-        std::count_if(text.begin(), text.end(), [](unsigned char byte) { return (byte & 0xC0U) != 0x80U; }));
+        std::ranges::count_if(text, [](unsigned char byte) { return (byte & 0xC0U) != 0x80U; }));
 }
 
 /// Fills lines word by word, and breaks a word that is wider than a line.

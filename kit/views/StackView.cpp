@@ -159,8 +159,8 @@ void StackView::updateConstraints()
 {
     LayoutConstraint::deactivate(_own);
     std::vector<std::shared_ptr<View>> visible;
-    std::copy_if(_arranged.begin(), _arranged.end(), std::back_inserter(visible),
-        [](const auto& view) { return !view->isHidden(); });
+    std::ranges::copy_if(
+        _arranged, std::back_inserter(visible), [](const auto& view) { return !view->isHidden(); });
     _own = StackBuilder(*this, std::move(visible)).build();
     LayoutConstraint::activate(_own);
 }

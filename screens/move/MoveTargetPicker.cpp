@@ -64,14 +64,13 @@ bool MoveTargetPicker::offers(const Url& folder) const
 
 bool MoveTargetPicker::isToBeMoved(const Url& folder) const
 {
-    return std::any_of(_itemsToMove.begin(), _itemsToMove.end(),
-        [&folder](const Url& item) { return folder.isWithin(item); });
+    return std::ranges::any_of(_itemsToMove, [&folder](const Url& item) { return folder.isWithin(item); });
 }
 
 bool MoveTargetPicker::canChoose(const Url& folder) const
 {
     return !_itemsToMove.empty() && !isToBeMoved(folder)
-        && std::any_of(_itemsToMove.begin(), _itemsToMove.end(),
+        && std::ranges::any_of(_itemsToMove,
             [&folder](const Url& item) { return !(item.deletingLastPathComponent() == folder); });
 }
 

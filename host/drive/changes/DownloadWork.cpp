@@ -30,7 +30,7 @@ constexpr std::int64_t nanosecondsPerSecond = 1'000'000'000;
 /// Copies the attributes and the modification date in the promise to the file.
 SystemError mark(const FileDescriptor& file, const PromiseRecord& promise)
 {
-    const auto role = !promise.role ? "" : nameOf(*promise.role);
+    const auto* const role = !promise.role ? "" : nameOf(*promise.role);
     const auto identifier = promise.documentIdentifier;
     const std::pair<const char*, std::string> marks[] = {{itemMark::tags, joinedTags(promise.tags)},
         {itemMark::shared, promise.shared ? "1" : ""}, {itemMark::role, role},

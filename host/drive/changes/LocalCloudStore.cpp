@@ -136,6 +136,8 @@ platform::Result<std::vector<std::string>> LocalCloudStore::listChanges(platform
     while (const auto entry = reader->next()) {
         struct stat found;
         // A rename into the folder sets the status change time and leaves the modification time.
+        // The reader's names end with a null character.
+        // NOLINTNEXTLINE(bugprone-suspicious-stringview-data-usage)
         if (::fstatat(folder->get(), entry->name.data(), &found, AT_SYMLINK_NOFOLLOW) == 0
             && versionOf(found).changed >= since.nanoseconds)
             names.emplace_back(entry->name);

@@ -45,8 +45,8 @@ bool isInWork(const std::string& path)
 {
     constexpr std::array prefixes{
         WorkRecord::heldPrefix, WorkRecord::gonePrefix, WorkRecord::movedPrefix, WorkRecord::temporaryPrefix};
-    return std::ranges::any_of(
-        prefixes, [&](const char* prefix) { return path.find('/' + std::string(prefix)) != path.npos; });
+    return std::ranges::any_of(prefixes,
+        [&](const char* prefix) { return path.find('/' + std::string(prefix)) != std::string::npos; });
 }
 
 std::int64_t birthOfPromise(const std::string& path)
@@ -98,7 +98,7 @@ DocumentFinder::Finding DocumentFinder::find(
 {
     std::optional<Candidate> best;
     Finding finding;
-    std::size_t left = static_cast<std::size_t>(effort);
+    auto left = static_cast<std::size_t>(effort);
     const auto entry = [&](const Url& url, FileType type) {
         const auto& path = url.path();
         if (depth == Depth::Folder && path.find('/', folder.size() + 1) != std::string::npos)
@@ -151,6 +151,7 @@ std::vector<IdentifiedPlace> DocumentFinder::findAll() const
     const DeepEnumeration::ErrorHandler error = goOn;
     DeepEnumeration(Url::fileURL(_layout.documents()), entry, error).run();
     std::vector<IdentifiedPlace> all;
+    all.reserve(found.size());
     for (auto& [identifier, candidate] : found)
         all.push_back({identifier, std::move(candidate.place)});
     return all;

@@ -38,8 +38,8 @@ public:
     platform::Result<Attributes> attributes() const override;
 
 private:
-    IdentifiedItem(const DriveLayout& layout, std::string path)
-        : _layout(layout)
+    IdentifiedItem(DriveLayout layout, std::string path)
+        : _layout(std::move(layout))
         , _path(std::move(path))
     {
     }

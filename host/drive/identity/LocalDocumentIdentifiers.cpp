@@ -151,7 +151,7 @@ std::optional<DocumentPlace> LocalDocumentIdentifiers::locate(const IdentifiedPl
             return inFolder;
         best = best ? best : inFolder;
     }
-    const auto inDrive = _finder.findInDrive(known, effort).place;
+    auto inDrive = _finder.findInDrive(known, effort).place;
     if (inDrive && (!best || inDrive->inode == known.place.inode))
         return inDrive;
     return best;

@@ -27,7 +27,7 @@ struct AccountRecord {
     /// that the file exists but cannot be used; it is left as it is. Any thread.
     static platform::Result<AccountRecord> read(const DriveLayout& layout);
     /// Parses the file's text.
-    static platform::Result<AccountRecord> parse(const std::string& text, const std::string& path);
+    static platform::Result<AccountRecord> parse(const std::string& content, const std::string& path);
 
     std::string toJson() const;
 };

@@ -24,7 +24,7 @@ struct ContainerRecord {
     std::optional<std::string> iconName;
 
     /// Answers nothing for a text that is not a JSON object. A member of the wrong type counts as missing.
-    static std::optional<ContainerRecord> parse(const std::string& text);
+    static std::optional<ContainerRecord> parse(const std::string& content);
     std::string toJson() const;
 
     /// Answers the name in the first of the languages that has one, else the English name, else any, else an

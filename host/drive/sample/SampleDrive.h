@@ -17,7 +17,7 @@ struct Outcome {
 /// Fills a drive with a household's documents and signs its owner in: every kind of document that the preview
 /// shows, app libraries, promises, links, references, shared items, tags, names in several scripts. Existing
 /// items stay as they are, so it can be run again.
-Outcome makeSampleDrive(const DriveLayout& layout);
+Outcome makeSampleDrive(const DriveLayout& wanted);
 
 /// The folder of the sample with a thousand items, and their number.
 inline constexpr const char* largeFolder = "BrindleDefault/Documents/Household/Receipts";

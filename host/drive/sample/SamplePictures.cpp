@@ -9,6 +9,7 @@
 #include <array>
 #include <cmath>
 #include <memory>
+#include <sstream>
 #include <vector>
 
 namespace host::drive::sample {
@@ -266,7 +267,8 @@ std::string windowShotPng()
 
 std::string chartSvg()
 {
-    std::string svg =
+    std::ostringstream svg;
+    svg <<
         R"(<svg xmlns="http://www.w3.org/2000/svg" viewBox="0 0 640 400" width="640" height="400">
 <rect width="640" height="400" fill="#ffffff"/>
 <g font-family="sans-serif" font-size="14" fill="#3d3846">
@@ -276,12 +278,17 @@ std::string chartSvg()
     constexpr const char* names[] = {"bubble*", "heap", "merge", "quick", "radix"};
     constexpr const char* colours[] = {"#e66100", "#3584e4", "#33d17a", "#9141ac", "#f6d32d"};
     for (int i = 0; i < 5; ++i) {
-        const auto x = std::to_string(70 + i * 110), height = std::to_string(values[i] * 9 / 10);
-        svg += "<rect x=\"" + x + "\" y=\"" + std::to_string(340 - values[i] * 9 / 10)
-            + "\" width=\"70\" height=\"" + height + "\" rx=\"6\" fill=\"" + colours[i] + "\"/>\n<text x=\""
-            + std::to_string(105 + i * 110) + "\" y=\"364\" text-anchor=\"middle\">" + names[i] + "</text>\n";
+        const int height = values[i] * 9 / 10;
+        svg << R"(<rect x=")" << 70 + i * 110 << R"(" y=")" << 340 - height << R"(" width="70" height=")"
+            << height << R"(" rx="6" fill=")" << colours[i] << R"("/>
+<text x=")" << 105 + i * 110
+            << R"(" y="364" text-anchor="middle">)" << names[i] << "</text>\n";
     }
-    return svg + "</g>\n<line x1=\"50\" y1=\"340\" x2=\"610\" y2=\"340\" stroke=\"#3d3846\"/>\n</svg>\n";
+    svg << R"(</g>
+<line x1="50" y1="340" x2="610" y2="340" stroke="#3d3846"/>
+</svg>
+)";
+    return svg.str();
 }
 
 std::string sketchSvg(int variant)

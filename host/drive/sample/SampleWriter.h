@@ -31,8 +31,8 @@ public:
     /// Makes the content; called only when the item is missing.
     using Content = std::function<std::string()>;
 
-    explicit SampleWriter(const DriveLayout& layout)
-        : _layout(layout)
+    explicit SampleWriter(DriveLayout layout)
+        : _layout(std::move(layout))
     {
     }
 

@@ -28,8 +28,8 @@ std::shared_ptr<AccountMonitor> AccountMonitor::start(
     return monitor;
 }
 
-AccountMonitor::AccountMonitor(const DriveLayout& layout, const DriveDependencies& dependencies)
-    : _layout(layout)
+AccountMonitor::AccountMonitor(DriveLayout layout, const DriveDependencies& dependencies)
+    : _layout(std::move(layout))
     , _notifications(dependencies.notificationCenter)
 {
 }

@@ -30,7 +30,7 @@ public:
     void check() { _file->readAgain(); }
 
 private:
-    AccountMonitor(const DriveLayout& layout, const DriveDependencies& dependencies);
+    AccountMonitor(DriveLayout layout, const DriveDependencies& dependencies);
 
     void begin(const DriveDependencies& dependencies);
     void identityRead(std::optional<std::string> identity);

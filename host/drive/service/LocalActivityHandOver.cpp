@@ -130,7 +130,7 @@ void LocalActivityHandOver::readAgain()
         });
 }
 
-void LocalActivityHandOver::recordsRead(Records records)
+void LocalActivityHandOver::recordsRead(const Records& records)
 {
     ++_reading;
     _found.clear();

@@ -48,7 +48,7 @@ private:
 
     void begin();
     void readAgain();
-    void recordsRead(Records records);
+    void recordsRead(const Records& records);
     void documentDecided(
         unsigned reading, const ActivityRecord& record, const platform::Result<platform::Url>& document);
     void readingEnded();

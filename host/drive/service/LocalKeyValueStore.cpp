@@ -8,6 +8,8 @@
 #include "platform/Log.h"
 #include "platform/Weakly.h"
 
+#include <utility>
+
 namespace host::drive {
 
 namespace {
@@ -83,8 +85,8 @@ std::shared_ptr<LocalKeyValueStore> LocalKeyValueStore::create(
     return store;
 }
 
-LocalKeyValueStore::LocalKeyValueStore(const DriveLayout& layout, const DriveDependencies& dependencies)
-    : _layout(layout)
+LocalKeyValueStore::LocalKeyValueStore(DriveLayout layout, const DriveDependencies& dependencies)
+    : _layout(std::move(layout))
     , _notifications(dependencies.notificationCenter)
 {
 }

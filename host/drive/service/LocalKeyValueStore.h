@@ -30,7 +30,7 @@ public:
     std::optional<platform::PropertyValue> objectForKey(const std::string& key) const override;
 
 private:
-    LocalKeyValueStore(const DriveLayout& layout, const DriveDependencies& dependencies);
+    LocalKeyValueStore(DriveLayout layout, const DriveDependencies& dependencies);
 
     void begin(const DriveDependencies& dependencies);
     void valuesRead(platform::PropertyDictionary values);

@@ -9,6 +9,8 @@
 #include "platform/Url.h"
 #include "platform/Weakly.h"
 
+#include <utility>
+
 namespace host::drive {
 
 namespace {
@@ -35,9 +37,8 @@ std::shared_ptr<LocalStorageOfferManager> LocalStorageOfferManager::create(
     return std::shared_ptr<LocalStorageOfferManager>(new LocalStorageOfferManager(layout, dependencies));
 }
 
-LocalStorageOfferManager::LocalStorageOfferManager(
-    const DriveLayout& layout, const DriveDependencies& dependencies)
-    : _layout(layout)
+LocalStorageOfferManager::LocalStorageOfferManager(DriveLayout layout, const DriveDependencies& dependencies)
+    : _layout(std::move(layout))
     , _dispatch(dependencies.dispatch)
     , _notifications(dependencies.notificationCenter)
     , _linkOpener(dependencies.linkOpener)

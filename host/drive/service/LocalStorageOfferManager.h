@@ -30,7 +30,7 @@ public:
     void accountFileChanged();
 
 private:
-    LocalStorageOfferManager(const DriveLayout& layout, const DriveDependencies& dependencies);
+    LocalStorageOfferManager(DriveLayout layout, const DriveDependencies& dependencies);
 
     void fetch();
     void offerRead(std::optional<platform::StorageOffer> offer);

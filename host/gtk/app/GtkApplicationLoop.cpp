@@ -216,7 +216,8 @@ bool GtkApplicationLoop::openDisplay()
     if (!gtk_init_check() || (!gdk_display_get_default() && !gdk_display_open(nullptr)))
         return false;
     std::cout << platform::localized("Open %@ in a web browser on this machine.", {_broadway->address()})
-              << std::endl;
+              << '\n'
+              << std::flush;
     return true;
 }
 

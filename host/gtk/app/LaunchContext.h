@@ -5,6 +5,7 @@
 
 #include <memory>
 
+// NOLINTNEXTLINE(bugprone-reserved-identifier): the library's name
 using GAppLaunchContext = struct _GAppLaunchContext;
 
 namespace host::gtk {

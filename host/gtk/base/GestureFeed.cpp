@@ -11,7 +11,6 @@
 namespace host::gtk {
 
 using kit::GestureRecognizer;
-using platform::Point;
 
 namespace {
 

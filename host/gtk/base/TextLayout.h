@@ -30,7 +30,7 @@ std::string text(const kit::AttributedText& text);
 bool hasAttachments(const kit::AttributedText& text);
 
 ObjectRef<PangoLayout> make(
-    PangoContext* context, std::string_view text, Attributes attributes, const kit::TextLimits& limits);
+    PangoContext* context, std::string_view characters, Attributes attributes, const kit::TextLimits& limits);
 /// Draws a layout with its images. The top left corner of the first line is at (0, 0).
 void draw(cairo_t* cairo, PangoLayout* layout);
 

@@ -151,7 +151,7 @@ void ViewPeer::mirrorSubviews(const View& shown)
         const auto isPeer = [&](const std::shared_ptr<ViewPeer>& peer) {
             return peer && peer->view() == subview;
         };
-        const auto known = std::find_if(before.begin(), before.end(), isPeer);
+        const auto known = std::ranges::find_if(before, isPeer);
         const auto peer =
             known != before.end() ? std::exchange(*known, nullptr) : makePeer(_context, subview);
         CanvasWidget::insertAfter(childContainer(), peer->widget(), previous);

@@ -71,20 +71,20 @@ protected:
     virtual GtkWidget* childContainer() const { return _canvas.get(); }
     virtual platform::Point childOrigin() const;
     /// Copies changes of the model to the widgets.
-    virtual void mirror(kit::View& view, kit::ViewChanges changes);
+    virtual void mirror(kit::View& shown, kit::ViewChanges changes);
     void allocateChildren();
     void connect(SignalConnection connection) { _connections.push_back(std::move(connection)); }
 
 private:
     void mirrorPending();
-    void mirrorSubviews(const kit::View& view);
-    void mirrorAccessibility(const kit::View& view);
-    void mirrorGestures(const kit::View& view);
+    void mirrorSubviews(const kit::View& shown);
+    void mirrorAccessibility(const kit::View& shown);
+    void mirrorGestures(const kit::View& shown);
     void dropFocus();
     void queueAllocateInParent() const;
-    void snapshotBackground(const kit::View& view, GtkSnapshot* snapshot, const GskRoundedRect& shape);
-    void snapshotBorder(const kit::View& view, GtkSnapshot* snapshot, const GskRoundedRect& shape);
-    void snapshotDrawing(const kit::View& view, GtkSnapshot* snapshot);
+    void snapshotBackground(const kit::View& shown, GtkSnapshot* snapshot, const GskRoundedRect& shape);
+    void snapshotBorder(const kit::View& shown, GtkSnapshot* snapshot, const GskRoundedRect& shape);
+    void snapshotDrawing(const kit::View& shown, GtkSnapshot* snapshot);
 
     std::shared_ptr<PeerContext> _context;
     std::weak_ptr<kit::View> _view;

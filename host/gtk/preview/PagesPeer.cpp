@@ -12,7 +12,6 @@
 namespace host::gtk {
 
 using platform::Image;
-using platform::Point;
 using platform::Rect;
 using platform::Size;
 using screens::PreviewPagesView;

@@ -35,7 +35,7 @@ void show(GtkWidget* holder, PreviewView& view, const Peer& peer)
 
 /// Registers a maker. `fill` puts the peer of a new view into its holder, at once or later.
 template <typename View, typename Fill>
-void addMaker(PeerContext& context, Fill fill)
+void addMaker(PeerContext& context, const Fill& fill)
 {
     context.setHostedViewMaker(
         View::kindName, [fill](kit::HostedView& hosted, GtkWidget* current) -> ObjectRef<GtkWidget> {

@@ -32,8 +32,8 @@ public:
 private:
     void showCustomView(const std::shared_ptr<kit::View>& view);
     void showButton();
-    void mirror(const kit::BarButtonItem& item);
-    void showFace(const kit::BarButtonItem& item);
+    void mirror(const kit::BarButtonItem& shown);
+    void showFace(const kit::BarButtonItem& shown);
 
     std::shared_ptr<PeerContext> _context;
     std::weak_ptr<kit::BarButtonItem> _item;

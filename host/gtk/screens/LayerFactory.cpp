@@ -98,7 +98,7 @@ GtkPositionType sideOf(const kit::PopoverAnchor& anchor, const GdkRectangle& pla
         if (place.x >= widestPopover)
             return GTK_POS_LEFT;
     }
-    return place.y + place.height / 2 > window.height / 2 ? GTK_POS_TOP : GTK_POS_BOTTOM;
+    return place.y + place.height / 2.0 > window.height / 2 ? GTK_POS_TOP : GTK_POS_BOTTOM;
 }
 
 class LayerMaker : public kit::ViewControllerVisitor {

@@ -233,7 +233,7 @@ void WindowPeer::windowWillDismiss(
         token.finish();
         return;
     }
-    const Layer gone = *found;
+    const Layer gone = std::move(*found);
     _layers.erase(found);
     coverAllButTop();
     giveFocusBack(gone.focusBefore.get());

@@ -18,7 +18,7 @@ public:
         std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ActivityIndicator>& indicator);
 
 protected:
-    void mirror(kit::View& view, kit::ViewChanges changes) override;
+    void mirror(kit::View& shown, kit::ViewChanges changes) override;
 
 private:
     std::weak_ptr<kit::ActivityIndicator> _indicator;

@@ -18,7 +18,7 @@ public:
     ButtonPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::Button>& button);
 
 protected:
-    void mirror(kit::View& view, kit::ViewChanges changes) override;
+    void mirror(kit::View& shown, kit::ViewChanges changes) override;
 
 private:
     void mirrorContent(const kit::Button& button);

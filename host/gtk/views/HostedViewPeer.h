@@ -17,7 +17,7 @@ public:
     HostedViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::HostedView>& hosted);
 
 protected:
-    void mirror(kit::View& view, kit::ViewChanges changes) override;
+    void mirror(kit::View& shown, kit::ViewChanges changes) override;
 
 private:
     std::weak_ptr<kit::HostedView> _hosted;

@@ -20,7 +20,7 @@ public:
     void canvasSnapshot(GtkSnapshot* snapshot) override;
 
 protected:
-    void mirror(kit::View& view, kit::ViewChanges changes) override;
+    void mirror(kit::View& shown, kit::ViewChanges changes) override;
 
 private:
     std::weak_ptr<kit::Label> _label;

@@ -24,7 +24,7 @@ bool isRow(GtkWidget* widget);
 /// Makes the widget take the room of a row that is shown later.
 void reserve(GtkWidget* row, double height);
 /// Shows a row. It is cheap when the widget shows the row already.
-void show(GtkWidget* row, const kit::ListRow& content, double height);
+void show(GtkWidget* widget, const kit::ListRow& content, double height);
 const kit::ListRow& shown(GtkWidget* row);
 guint position(GtkWidget* row);
 /// Answers whether a point of the row, in its own coordinates, lies on the check mark or before it.

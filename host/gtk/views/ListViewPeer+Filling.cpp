@@ -101,6 +101,7 @@ std::vector<GtkListItem*> ListViewPeer::unfilledBesideSeen() const
 std::vector<GtkWidget*> ListViewPeer::liveRows() const
 {
     std::vector<GtkWidget*> rows;
+    rows.reserve(_live.size());
     for (auto* item : _live)
         rows.push_back(gtk_list_item_get_child(item));
     return rows;

@@ -47,7 +47,7 @@ protected:
     GtkWidget* spoken() const override { return _listWidget; }
     GtkWidget* childContainer() const override { return widget(); }
     platform::Point childOrigin() const override { return {}; }
-    void mirror(kit::View& view, kit::ViewChanges changes) override;
+    void mirror(kit::View& shown, kit::ViewChanges changes) override;
 
 private:
     void buildWidgets();

@@ -20,7 +20,7 @@ public:
 protected:
     GtkWidget* childContainer() const override { return _content.get(); }
     platform::Point childOrigin() const override;
-    void mirror(kit::View& view, kit::ViewChanges changes) override;
+    void mirror(kit::View& shown, kit::ViewChanges changes) override;
 
 private:
     class Content;

@@ -25,7 +25,7 @@ public:
     void setOnReturn(std::function<void()> callback) { _onReturn = std::move(callback); }
 
 protected:
-    void mirror(kit::View& view, kit::ViewChanges changes) override;
+    void mirror(kit::View& shown, kit::ViewChanges changes) override;
 
 private:
     void connectEvents();

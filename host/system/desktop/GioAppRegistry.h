@@ -9,6 +9,7 @@
 #include <memory>
 #include <string>
 
+// NOLINTNEXTLINE(bugprone-reserved-identifier): the library's name
 using GAppLaunchContext = struct _GAppLaunchContext;
 
 namespace host::system {

@@ -24,10 +24,10 @@ public:
     using EntryHandler = std::function<Continue(const platform::Url&, platform::FileType)>;
     using ErrorHandler = std::function<Continue(const platform::Url&, const platform::Error&)>;
 
-    DeepEnumeration(const platform::Url& folder, const EntryHandler& entry, const ErrorHandler& error)
+    DeepEnumeration(platform::Url folder, const EntryHandler& entry, const ErrorHandler& error)
         : _entry(entry)
         , _error(error)
-        , _root(folder)
+        , _root(std::move(folder))
     {
     }
 

@@ -12,7 +12,6 @@
 namespace host::system {
 
 using platform::FolderEntry;
-using platform::FolderEntryKind;
 
 namespace {
 

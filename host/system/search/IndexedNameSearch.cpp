@@ -27,6 +27,7 @@ constexpr auto keptUnused = std::chrono::seconds(60);
 std::vector<std::string> pathsOf(const std::vector<Url>& folders)
 {
     std::vector<std::string> paths;
+    paths.reserve(folders.size());
     for (const auto& folder : folders)
         paths.push_back(folder.path());
     return paths;

@@ -42,7 +42,7 @@ struct Amount {
 Amount amount(std::uint64_t bytes, ByteCountStyle style)
 {
     const double base = style == ByteCountStyle::File ? 1000 : 1024;
-    double value = static_cast<double>(bytes);
+    auto value = static_cast<double>(bytes);
     for (int unit = 0;; ++unit, value /= base) {
         const double scale = std::pow(10, fractionDigits(unit));
         const double shown = std::round(value * scale) / scale;
