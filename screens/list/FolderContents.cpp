@@ -55,7 +55,7 @@ void FolderContents::snapshotArrived(Snapshot snapshot)
     if (_isWorking)
         wait(std::move(snapshot));
     else
-        workOut(std::move(snapshot));
+        workOut(snapshot);
 }
 
 void FolderContents::wait(Snapshot snapshot)
@@ -66,15 +66,15 @@ void FolderContents::wait(Snapshot snapshot)
     _waiting.push_back(std::move(snapshot));
 }
 
-void FolderContents::workOut(Snapshot snapshot)
+void FolderContents::workOut(const Snapshot& snapshot)
 {
     if (std::max(snapshot->count(), _rows->count()) <= immediateRows && !_order.needsLooks())
-        adopt(updateBetween(*_rows, std::move(snapshot), _order));
+        adopt(updateBetween(*_rows, snapshot, _order));
     else
-        workOutInBackground(std::move(snapshot));
+        workOutInBackground(snapshot);
 }
 
-void FolderContents::workOutInBackground(Snapshot snapshot)
+void FolderContents::workOutInBackground(const Snapshot& snapshot)
 {
     _isWorking = true;
     const auto main = services().dispatch().mainQueue();

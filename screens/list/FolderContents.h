@@ -46,8 +46,8 @@ private:
     using Snapshot = std::shared_ptr<const FolderSnapshot>;
     void snapshotArrived(Snapshot snapshot);
     void wait(Snapshot snapshot);
-    void workOut(Snapshot snapshot);
-    void workOutInBackground(Snapshot snapshot);
+    void workOut(const Snapshot& snapshot);
+    void workOutInBackground(const Snapshot& snapshot);
     void workEnded(const FolderContentsUpdate& update);
     void adopt(const FolderContentsUpdate& update);
 

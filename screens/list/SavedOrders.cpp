@@ -30,7 +30,7 @@ std::string nameOf(const Url& folder)
     for (const char c : folder.path())
         hash = (hash ^ static_cast<unsigned char>(c)) * 0x100000001b3ULL;
     char digits[16];
-    const auto end = std::to_chars(std::begin(digits), std::end(digits), hash, 16).ptr;
+    auto* const end = std::to_chars(std::begin(digits), std::end(digits), hash, 16).ptr;
     return {digits, end};
 }
 

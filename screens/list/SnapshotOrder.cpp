@@ -94,7 +94,7 @@ private:
     }
     static std::string nameOf(const FolderEntry& entry)
     {
-        const auto key = keyFor(entry);
+        auto key = keyFor(entry);
         if (opensAsFolder(entry.kind) || entry.kind == FolderEntryKind::Link)
             return key;
         const auto& types = services().typeRegistry();

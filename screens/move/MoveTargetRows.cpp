@@ -73,6 +73,7 @@ kit::RowId MoveTargetRows::rowIdAtIndex(const kit::ListView&, std::size_t index)
 std::vector<kit::RowId> MoveTargetRows::ids() const
 {
     std::vector<kit::RowId> ids;
+    ids.reserve(headRows() + _folders.size());
     for (std::size_t row = 0; row < headRows() + _folders.size(); ++row)
         ids.push_back(idAt(row));
     return ids;

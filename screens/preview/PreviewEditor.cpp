@@ -212,7 +212,7 @@ void PreviewEditor::show(const FormField& field)
         return;
     const bool isText = field.kind == FormField::Kind::Text && !field.isMultiline;
     _fieldBar->setField(field);
-    if (std::exchange(_hasField, true) == false) {
+    if (!std::exchange(_hasField, true)) {
         _fieldBar->setHidden(false);
         _callbacks.layoutDidChange();
     }

@@ -74,6 +74,12 @@ std::string unreadableWords(const std::string& path)
     return localized("You do not have permission to see it.");
 }
 
+PreviewContent unreadable(PreviewContent content)
+{
+    const auto words = unreadableWords(content.path);
+    return failure(std::move(content), words);
+}
+
 bool isOfKind(const AttributeMap& values, std::string_view type)
 {
     const auto* own = values.get<std::string>(AttributeKey::TypeIdentifier);
@@ -128,7 +134,7 @@ PreviewContent textContent(PreviewContent content, const Reading& reading, bool 
     std::string bytes(limit + 1, '\0');
     file.read(bytes.data(), static_cast<std::streamsize>(bytes.size()));
     if (!file.is_open() || file.bad() || (file.fail() && !file.eof()))
-        return failure(std::move(content), unreadableWords(content.path));
+        return unreadable(std::move(content));
     const auto count = static_cast<std::size_t>(file.gcount());
     const bool isCut = count > limit;
     bytes.resize(isCut ? limit : count);
@@ -160,7 +166,7 @@ PreviewContent mediaContent(PreviewContent content, Kind kind)
     // The player reads the file by itself, but its message for an unreadable file is less clear, so this is
     // checked first.
     if (!std::ifstream(content.path, std::ios::binary).is_open())
-        return failure(std::move(content), unreadableWords(content.path));
+        return unreadable(std::move(content));
     content.kind = kind;
     return content;
 }
