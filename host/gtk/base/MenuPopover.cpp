@@ -16,13 +16,18 @@ namespace {
 
 constexpr int iconSize = 16;
 
+void takeAway(GtkWidget* popover)
+{
+    if (gtk_widget_get_parent(popover))
+        gtk_widget_unparent(popover);
+}
+
 /// Destroys a popover that has closed, but not inside its own signal.
 void endLater(GtkWidget* popover)
 {
     g_idle_add_once(
         [](gpointer data) {
-            if (gtk_widget_get_parent(GTK_WIDGET(data)))
-                gtk_widget_unparent(GTK_WIDGET(data));
+            takeAway(GTK_WIDGET(data));
             g_object_unref(data);
         },
         g_object_ref(popover));
@@ -81,6 +86,18 @@ GtkWidget* makeEntry(const kit::MenuAction& action)
     return entry;
 }
 
+/// Ends a menu together with the screen that it belongs to. A popover whose parent is no longer shown keeps
+/// the grab of the pointer and the keyboard, and nobody can close it any more.
+void endWithParent(GtkWidget* popover, GtkWidget* parent)
+{
+    auto parentLeaves = std::make_shared<SignalConnection>(connectSignal<void()>(parent, "unmap", [popover] {
+        const auto keepsAlive = ObjectRef<GtkWidget>::retain(popover);
+        gtk_popover_popdown(GTK_POPOVER(popover));
+        takeAway(popover);
+    }));
+    connectForLife<void()>(popover, "closed", [parentLeaves] { parentLeaves->disconnect(); });
+}
+
 } // namespace
 
 void showMenu(GtkWidget* parent, double x, double y, const kit::Menu& menu)
@@ -111,6 +128,7 @@ void showMenu(GtkWidget* parent, double x, double y, const kit::Menu& menu)
         endLater(popover);
     });
     keepDismissingTouchFromWindow(popover);
+    endWithParent(popover, parent);
     gtk_popover_popup(GTK_POPOVER(popover));
 }
 

@@ -9,8 +9,8 @@
 
 namespace host::gtk {
 
-/// Shows a context menu at a point of a widget. The menu destroys itself when it is closed; an entry's
-/// handler runs after that.
+/// Shows a context menu at a point of a widget. The menu closes with the widget when that is no longer shown,
+/// and destroys itself when it is closed; an entry's handler runs after that.
 void showMenu(GtkWidget* parent, double x, double y, const kit::Menu& menu);
 
 } // namespace host::gtk
