@@ -161,5 +161,32 @@ TEST_F(KeyboardTests, ADocumentIsSeenAndDeleted)
     expectKeyboardAt("Recipes");
 }
 
+TEST_F(KeyboardTests, ReachesTheRowsFromTheSelectButton)
+{
+    const auto focused = [this] {
+        std::string names;
+        for (const auto& place : program->all([](const Accessible& node) { return node.isFocused(); }))
+            names += place.roleName() + place.name();
+        return names;
+    };
+    const auto tabTo = [&](const std::string& beginning) {
+        for (int presses = 0; presses < 8 && !program->hasKeyboardAt(beginning); ++presses) {
+            const auto before = focused();
+            pressKey(tab);
+            EXPECT_TRUE(eventually([&] { return focused() != before; }))
+                << "the keyboard stays at " << before;
+        }
+        expectKeyboardAt(beginning);
+    };
+    start();
+    expectKeyboardAt("Desktop");
+    tabTo("Select");
+    pressKey(returnKey);
+    expectKeyboardAt("Cancel");
+    tabTo("Desktop");
+    pressKey(space);
+    EXPECT_TRUE(eventually([this] { return program->says("1 Item Selected"); }));
+}
+
 } // namespace
 } // namespace e2e

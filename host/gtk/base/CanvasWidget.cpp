@@ -69,6 +69,15 @@ gboolean contains(GtkWidget* widget, double x, double y)
     return FALSE;
 }
 
+gboolean focus(GtkWidget* widget, GtkDirectionType direction)
+{
+    if (!GTK_WIDGET_CLASS(trw_canvas_parent_class)->focus(widget, direction))
+        return FALSE;
+    auto* client = canvasOf(widget)->client;
+    return gtk_widget_get_focus_child(widget) || gtk_widget_is_focus(widget)
+        || (client && client->canvasTakesFocus());
+}
+
 void dispose(GObject* object)
 {
     auto* widget = GTK_WIDGET(object);
@@ -87,6 +96,7 @@ void trw_canvas_class_init(TrwCanvasClass* type)
     widget->size_allocate = allocate;
     widget->snapshot = snapshot;
     widget->contains = contains;
+    widget->focus = focus;
     gtk_widget_class_set_css_name(widget, "canvas");
     gtk_widget_class_set_accessible_role(widget, GTK_ACCESSIBLE_ROLE_GROUP);
 }

@@ -22,6 +22,10 @@ public:
     virtual void canvasSnapshot(GtkSnapshot* snapshot) = 0;
     /// Answers whether a point, in the widget's coordinates, belongs to the widget.
     virtual bool canvasContains(double x, double y) = 0;
+    /// A child said that it took the keyboard focus and did not: a scrolled window says so when what it
+    /// scrolls has no place for the focus. The client gives the focus to a child, and answers whether there
+    /// was one.
+    virtual bool canvasTakesFocus() { return false; }
 };
 
 /// A container that leaves the places of its children to its client. Without a client it is empty space. It

@@ -107,6 +107,20 @@ bool ListViewPeer::leaveByTab(GtkDirectionType direction)
     return hasLeft;
 }
 
+bool ListViewPeer::canvasTakesFocus()
+{
+    const auto list = _list.lock();
+    if (!list || !gtk_widget_get_can_focus(_listWidget))
+        return false;
+    const auto seen = list->visibleRows();
+    const auto first = std::ranges::min_element(_live, {}, [&](GtkListItem* item) {
+        const std::size_t position = gtk_list_item_get_position(item);
+        return seen.contains(position) ? position : list->rowCount() + position;
+    });
+    auto* place = first == _live.end() ? nullptr : gtk_widget_get_parent(gtk_list_item_get_child(*first));
+    return place && gtk_widget_grab_focus(place);
+}
+
 bool ListViewPeer::rowKeyPressed(std::size_t row, guint key, GdkModifierType modifiers)
 {
     const auto list = _list.lock();

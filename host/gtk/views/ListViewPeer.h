@@ -83,6 +83,8 @@ private:
     // These handle the keyboard.
     bool keyPressed(guint key, GdkModifierType modifiers);
     bool leaveByTab(GtkDirectionType direction);
+    /// The list forgets the row that has its focus when all rows are replaced, and lets nobody in then.
+    bool canvasTakesFocus() override;
     bool rowKeyPressed(std::size_t row, guint key, GdkModifierType modifiers);
     bool listKeyPressed(guint key, GdkModifierType modifiers);
     bool extendByKey(std::size_t from, guint key);
