@@ -5,6 +5,7 @@
 #include "host/drive/records/SmallFile.h"
 #include "host/drive/sample/SampleDrive.h"
 #include "host/system/files/AtomicWrite.h"
+#include "host/system/files/SystemErrors.h"
 
 #include <sys/stat.h>
 
@@ -12,6 +13,7 @@
 #include <cerrno>
 #include <cstdio>
 #include <filesystem>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -63,6 +65,17 @@ bool isUsableName(const std::string& name)
         && std::ranges::none_of(name, isControl);
 }
 
+/// Creates the folders with which a drive begins; those that are there already stay as they are.
+std::optional<platform::Error> makeFolders(const DriveLayout& layout)
+{
+    const auto top = layout.defaultContainer();
+    for (const auto& folder : {layout.documents(), top, top + "/Desktop", top + "/Documents"}) {
+        if (::mkdir(folder.c_str(), 0700) != 0 && errno != EEXIST)
+            return host::system::systemError(errno, folder);
+    }
+    return std::nullopt;
+}
+
 int signIn(const DriveLayout& wanted, const std::string& name)
 {
     if (!isUsableName(name)) {
@@ -78,13 +91,12 @@ int signIn(const DriveLayout& wanted, const std::string& name)
         std::printf("%s is signed in already.\n", name.c_str());
         return done;
     }
+    if (const auto error = makeFolders(layout))
+        return fail("Cannot sign in", *error);
+    // A program that waits for the account lists the folders as soon as the account is there.
     if (const auto error =
             host::system::writeFileAtomically(layout.account(), AccountRecord{identity, name, {}}.toJson()))
         return fail("Cannot sign in", *error);
-    ::mkdir(layout.documents().c_str(), 0700);
-    ::mkdir(layout.defaultContainer().c_str(), 0700);
-    for (const char* folder : {"/Desktop", "/Documents"})
-        ::mkdir((layout.defaultContainer() + folder).c_str(), 0700);
     std::printf("%s is signed in. The drive lies in %s.\n", name.c_str(), layout.home().c_str());
     return done;
 }
