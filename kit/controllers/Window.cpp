@@ -138,6 +138,12 @@ void Window::resized(Size size, const TraitCollection& traits)
     coordinator.run();
 }
 
+void Window::showNotice(const std::string& text)
+{
+    if (_visible)
+        _observer.notify([&](WindowObserver& observer) { observer.windowShowsNotice(*this, text); });
+}
+
 bool Window::backRequested()
 {
     const auto screens = presentedScreens();

@@ -15,6 +15,7 @@
 #include <functional>
 #include <memory>
 #include <optional>
+#include <string>
 #include <vector>
 
 namespace kit {
@@ -45,6 +46,10 @@ public:
     /// Answers the screens over the root, the topmost last.
     std::vector<std::shared_ptr<ViewController>> presentedScreens() const;
     void layoutIfNeeded();
+
+    /// Tells the user in a sentence of something that needs no answer, such as a document that another
+    /// program has deleted. The message goes by itself after a few seconds.
+    void showNotice(const std::string& text);
 
     // Events up: the host reports what happened to the window.
     void resized(Size size, const TraitCollection& traits);

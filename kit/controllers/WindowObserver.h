@@ -6,6 +6,8 @@
 #include "kit/controllers/Presentation.h"
 #include "kit/values/TransitionToken.h"
 
+#include <string>
+
 namespace kit {
 
 class Window;
@@ -22,6 +24,9 @@ public:
     /// The host takes the screen away and finishes the token when it is gone.
     virtual void windowWillDismiss(
         Window& window, const Presentation& presentation, TransitionToken token) = 0;
+    /// The host shows a short message for a few seconds, without giving it the keyboard focus. A host that
+    /// has no place for messages ignores it.
+    virtual void windowShowsNotice(Window&, const std::string&) { }
 };
 
 } // namespace kit

@@ -248,6 +248,12 @@ void WindowPeer::windowWillDismiss(
     });
 }
 
+void WindowPeer::windowShowsNotice(kit::Window&, const std::string& text)
+{
+    const std::unique_ptr<char, decltype(&g_free)> title(g_markup_escape_text(text.c_str(), -1), &g_free);
+    adw_toast_overlay_add_toast(_toasts, adw_toast_new(title.get()));
+}
+
 /// The layer is kept alive a little longer, because this is called from one of its own signals.
 void WindowPeer::layerHasGone(const std::shared_ptr<PresentedLayer>& layer)
 {

@@ -13,6 +13,7 @@
 #include <adwaita.h>
 
 #include <memory>
+#include <string>
 #include <vector>
 
 namespace host::gtk {
@@ -58,6 +59,7 @@ public:
         kit::Window& window, const kit::Presentation& presentation, kit::TransitionToken token) override;
     void windowWillDismiss(
         kit::Window& window, const kit::Presentation& presentation, kit::TransitionToken token) override;
+    void windowShowsNotice(kit::Window& window, const std::string& text) override;
 
 private:
     struct Layer {
