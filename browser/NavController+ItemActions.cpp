@@ -149,9 +149,9 @@ void NavController::showNewFolderPromptDuringMoveItemsToMove(
     }
     const auto title =
         items.empty() ? localized("New Folder") : localizedPlural(".DICT.MOVE_ITEMS.%d", {count(items)});
-    const auto confirmed = [weak = std::weak_ptr(self()), folder = *folder, items](
+    const auto confirmed = [weak = std::weak_ptr(self()), folder = *folder, items, asked = AccountSession()](
                                const std::string& name, bool& accepted) -> std::string {
-        if (name.empty())
+        if (name.empty() || !asked.isCurrent())
             return {};
         op.userAction("New Folder name entry Confirmed");
         op.info("New folder entered: %@", name);
@@ -200,6 +200,7 @@ void NavController::showMoveTargetForItemsInFolder(
     const auto picker = MoveTargetPicker::initWithItemsScope(
         items, mayLeave ? MoveTargetScope::AllContainers : MoveTargetScope::Container);
     picker->setDelegate(self());
+    _moveAsked.emplace();
     picker->setPresentationStyle(kit::PresentationStyle::OverCurrentContext);
     visibleViewController()->presentViewController(picker, true, [] { op.debug("Presented moveTarget"); });
 }
@@ -211,7 +212,8 @@ void NavController::documentTargetSelectionControllerDidSelectItemAtURL(
     op.userAction("Move Target Selected (nav)");
     op.info("Move Target Selected: %@", folder);
     picker->dismissViewController(true);
-    moveItemsToDirectoryAndShowErrorsToDirectory(picker->itemsToMove(), folder);
+    if (_moveAsked.value_or(AccountSession()).isCurrent())
+        moveItemsToDirectoryAndShowErrorsToDirectory(picker->itemsToMove(), folder);
 }
 
 std::vector<Error> NavController::moveItemsToDirectoryToDirectory(
@@ -250,9 +252,9 @@ void NavController::showRenamePrompt(const Url& url)
         UIUtils::showUnsupportedError(visibleViewController());
         return;
     }
-    _folderPromptAlert = RenamePrompt::newWithFilenameCompletion(
-        item->localizedName(), [url](const std::string& name, bool& accepted) -> std::string {
-            if (name.empty())
+    _folderPromptAlert = RenamePrompt::newWithFilenameCompletion(item->localizedName(),
+        [url, asked = AccountSession()](const std::string& name, bool& accepted) -> std::string {
+            if (name.empty() || !asked.isCurrent())
                 return {};
             op.userAction("Rename entry confirmed (nav)");
             const auto error = UIUtils::renameItemAtURLToName(url, name);
@@ -294,11 +296,12 @@ void NavController::showWarningAndDeleteURLsUsingViewWithDocumentListControllerF
     }
     UIUtils::showDeleteWarningAlertHasContainerViewControllerUsingViewUsingButtonCompletion(urls,
         libraries != 0, visibleViewController(), view, _barButtonDeleteItem,
-        [browser = self(), urls, list, finished](const auto&, bool cancelled) {
+        [browser = self(), urls, list, finished, asked = AccountSession()](const auto&, bool cancelled) {
             op.userAction(cancelled ? "Delete was Cancelled (nav)" : "Delete was Confirmed (nav)");
-            if (!cancelled && list)
+            const bool isConfirmed = !cancelled && asked.isCurrent();
+            if (isConfirmed && list)
                 browser->setEditModeAndUpdateUIForViewController(false, list);
-            browser->deleteConfirmed(cancelled ? std::vector<Url>() : urls, finished);
+            browser->deleteConfirmed(isConfirmed ? urls : std::vector<Url>(), finished);
         });
 }
 

@@ -9,6 +9,7 @@
 #include "items/LaunchUtils.h"
 #include "items/UrlResolution.h"
 #include "kit/controllers/SearchPresentation.h"
+#include "kit/controllers/Window.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
 #include "platform/Localization.h"
@@ -18,6 +19,7 @@
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
+#include "screens/DisplayName.h"
 #include "screens/list/DocumentListController.h"
 
 #include <array>
@@ -47,28 +49,48 @@ std::string described(const std::shared_ptr<DRItem>& item)
     return item ? item->description() : "(null)";
 }
 
-/// Answers the target of a symbolic link, one step further, when both ends lie in the drive's documents, else
-/// null.
-std::shared_ptr<DRItem> followLink(const DRItem& link, const Operation& op)
+/// Where a symbolic link leads.
+struct LinkTarget {
+    enum class Place { InDrive, OutsideDrive, Nowhere };
+    Place place = Place::InDrive;
+    std::shared_ptr<DRItem> item{}; ///< null unless the place lies in the drive
+};
+
+LinkTarget::Place placeOf(const std::optional<Url>& refused)
+{
+    return refused ? LinkTarget::Place::OutsideDrive : LinkTarget::Place::Nowhere;
+}
+
+/// Says why a link cannot be followed.
+std::string refusal(LinkTarget::Place place, const Url& link)
+{
+    const auto name = screens::displayName(link.lastPathComponent());
+    return place == LinkTarget::Place::OutsideDrive
+        ? platform::localized("“%@” leads to a place outside the drive.", {name})
+        : platform::localized("“%@” leads to something that is not there.", {name});
+}
+
+/// Answers the target of a symbolic link, one step further, when both ends lie in the drive's documents.
+LinkTarget followLink(const DRItem& link, const Operation& op)
 {
     const auto& target = link.resolvedURL();
     if (!isInDocumentsArea(target)) {
         op.debug("DLC Selection is symlink to outside target: %@", target);
-        return nullptr;
+        return {placeOf(target)};
     }
     auto item = DRItem::initWithURL(*target);
     if (!item) {
         op.debug("DLC Selection is symlink that didn't resolve to valid target: %@", target);
-        return nullptr;
+        return {LinkTarget::Place::Nowhere};
     }
     if (!isInDocumentsArea(item->resolvedURL())) {
         op.debug("DLC Selection is symlink to invalid target: %@", item->resolvedURL());
-        return nullptr;
+        return {placeOf(item->resolvedURL())};
     }
-    return item;
+    return {LinkTarget::Place::InDrive, std::move(item)};
 }
 
-std::vector<NavController::Screen> screens(const PreviewItemManager::ListStack& lists)
+std::vector<NavController::Screen> asScreens(const PreviewItemManager::ListStack& lists)
 {
     return {lists.begin(), lists.end()};
 }
@@ -137,16 +159,22 @@ bool NavController::isSearchPresented() const
     return std::dynamic_pointer_cast<kit::SearchPresentation>(presentedViewController()) != nullptr;
 }
 
-void NavController::dismissPresentedScreen()
+void NavController::endEverythingPresented()
 {
     if (presentedViewController())
         dismissViewController(false);
 }
 
+void NavController::tell(const std::string& notice) const
+{
+    if (const auto shown = window())
+        shown->showNotice(notice);
+}
+
 bool NavController::warpToNewURLPreviewMode(const std::optional<Url>& url, int mode)
 {
     static constexpr Operation op{"-[NavController warpToNewURL:previewMode:]"};
-    dismissPresentedScreen();
+    endEverythingPresented();
     if (!url)
         return false;
     if (!cloudItems().isInDocumentsArea(*url)) {
@@ -170,13 +198,13 @@ bool NavController::warpToFolderForURL(const Url& url)
 {
     const auto stack = PreviewItemManager::dlcStackForURL(url);
     if (stack)
-        setViewControllers(screens(*stack), false);
+        setViewControllers(asScreens(*stack), false);
     return stack.has_value();
 }
 
 void NavController::startSearch(const std::string& query)
 {
-    dismissPresentedScreen();
+    endEverythingPresented();
     popToRootViewController(false);
     auto& dispatch = services().dispatch();
     dispatch.after(searchDelay, dispatch.mainQueue(), weakly(this, [query](NavController& self) {
@@ -226,10 +254,12 @@ void NavController::documentListControllerDidSelectItemAtURL(const List&, const 
         op.debug("DLC Selection not allowed while in edit mode");
         return;
     }
-    if (item->isSymlink())
-        item = followLink(*item, op);
-    if (!item)
-        return;
+    if (item->isSymlink()) {
+        auto target = followLink(*item, op);
+        if (!target.item)
+            return tell(refusal(target.place, url));
+        item = std::move(target.item);
+    }
     if (item->isDirectory()) {
         op.debug("Building DLC stack for symlink to %@", item->url());
         openFolder(item->url(), op);
@@ -249,7 +279,7 @@ void NavController::showVanishedItem(const Url& url)
 void NavController::openFolder(const Url& url, const Operation& op)
 {
     if (const auto stack = PreviewItemManager::dlcStackForURL(url))
-        setViewControllers(screens(*stack), true);
+        setViewControllers(asScreens(*stack), true);
     else
         op.error("Couldn't build DLC stack for %@. Not switching to folder", url);
 }
@@ -284,8 +314,12 @@ void NavController::documentListControllerItemsChanged(const List& list)
     updateStatusUI(list);
 }
 
-void NavController::documentListControllerURLWasRemoved(const List&)
+void NavController::documentListControllerURLWasRemoved(const List& list)
 {
+    // What lies over the list asks about items that went with the folder.
+    endEverythingPresented();
+    if (viewControllers().size() > 1)
+        tell(platform::localized("“%@” is no longer there.", {list->title()}));
     popViewController(true);
 }
 

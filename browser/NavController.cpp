@@ -110,6 +110,10 @@ void NavController::setupDrive()
         setViewControllers({root}, false);
     } else {
         op.error("_FolderListScreen creation failed");
+        setToolbarHidden(true);
+        setViewControllers({UnavailableScreen::createForMissingDrive(
+                               weakly(this, &NavController::setupInitialViewController))},
+            false);
     }
     _quotaFetcher = QuotaFetcher::init();
     _quotaFetcher->setDelegate(self());
@@ -159,6 +163,8 @@ void NavController::handleAccountChanges()
     }
     op.info("Tarrow Token Changed, enabled=%{public}@, reinitializing view", token ? "YES" : "NO");
     saveTarrowToken(token);
+    endEverythingPresented();
+    _editMode = false;
     setupInitialViewController();
 }
 

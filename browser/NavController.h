@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "items/AccountSession.h"
 #include "kit/controllers/NavigationController.h"
 #include "platform/Date.h"
 #include "platform/NotificationCenter.h"
@@ -211,7 +212,11 @@ private:
     void fetchQuotaAfter(int seconds);
     void replaceItemManager(int mode);
     void dropItemManager();
-    void dismissPresentedScreen();
+    /// Takes away every screen that lies over the stack (prompts, questions, pickers, peeks, the search).
+    /// None of them is answered.
+    void endEverythingPresented();
+    /// Tells the user of something that needs no answer.
+    void tell(const std::string& notice) const;
     bool isSearchPresented() const;
     void showVanishedItem(const platform::Url& url);
     void openFolder(const platform::Url& url, const platform::Operation& op);
@@ -238,6 +243,7 @@ private:
     std::shared_ptr<screens::UpgradeFlow> _upgradeFlowMgr;
     std::shared_ptr<const platform::StorageOffer> _upgradeOffer;
     std::uint64_t _quotaBytes = 0;
+    std::optional<AccountSession> _moveAsked; ///< who was asked last for the destination of a move
     std::vector<platform::Observation> _observations;
 };
 

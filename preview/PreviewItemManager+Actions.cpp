@@ -62,9 +62,9 @@ void PreviewItemManager::showWarningAndDeleteDocumentBarButton(
     const auto url = itemURL();
     UIUtils::showDeleteWarningAlertHasContainerViewControllerUsingViewUsingButtonCompletion(
         url ? std::vector{*url} : std::vector<Url>(), false, screen, nullptr, button,
-        [self = shared_from_this(), screen](const auto&, bool cancelled) {
+        [self = shared_from_this(), screen, asked = AccountSession()](const auto&, bool cancelled) {
             op.userAction(cancelled ? "Delete was Cancelled (itemMgr)" : "Delete was Confirmed (itemMgr)");
-            if (!cancelled)
+            if (!cancelled && asked.isCurrent())
                 self->removeItem(screen);
         });
 }
@@ -97,6 +97,7 @@ void PreviewItemManager::showMoveTarget(const Screen& screen)
     const auto picker = MoveTargetPicker::initWithItemsScope(
         items, trw_canCrossZoneMoveURLs(items) ? MoveTargetScope::AllContainers : MoveTargetScope::Container);
     picker->setDelegate(weak_from_this());
+    _moveAsked.emplace();
     picker->setPresentationStyle(kit::PresentationStyle::OverCurrentContext);
     presenter->presentViewController(picker, true, [] { op.debug("Presented moveTarget"); });
 }
@@ -109,6 +110,8 @@ void PreviewItemManager::documentTargetSelectionControllerDidSelectItemAtURL(
     op.debug("MoveTarget = %@", folder);
     op.debug("ItemsToMove = %@", picker->itemsToMove());
     picker->dismissViewController(true);
+    if (!_moveAsked.value_or(AccountSession()).isCurrent())
+        return;
     std::vector<Move> moves;
     for (const auto& item : picker->itemsToMove())
         moves.push_back({item, folder.appendingPathComponent(item.lastPathComponent())});

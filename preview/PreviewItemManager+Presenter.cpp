@@ -4,18 +4,23 @@
 // This file follows the changes that other programs make to the previewed item.
 
 #include "items/DRItem.h"
+#include "kit/controllers/Window.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
 #include "platform/FileCoordinator.h"
+#include "platform/Localization.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/Weakly.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewDetailsViewController.h"
 #include "preview/PreviewItemManager.h"
+#include "screens/DisplayName.h"
+#include "screens/FolderPlaces.h"
 
 namespace tarrow {
 
+using platform::localized;
 using platform::Operation;
 using platform::services;
 using platform::Url;
@@ -25,6 +30,24 @@ namespace {
 
 /// Programs save in several steps, so one reading after the last step is enough.
 constexpr auto refreshDelay = std::chrono::seconds(1);
+
+std::string shownName(const std::optional<Url>& url)
+{
+    return url ? screens::displayName(url->lastPathComponent()) : std::string();
+}
+
+std::string deletedNotice(const std::optional<Url>& url)
+{
+    return localized("“%@” was deleted", {shownName(url)});
+}
+
+std::string movedNotice(const Url& from, const Url& to)
+{
+    const auto folder = to.deletingLastPathComponent();
+    if (folder == from.deletingLastPathComponent())
+        return localized("“%1$@” is now called “%2$@”", {shownName(from), shownName(to)});
+    return localized("“%1$@” was moved to “%2$@”", {shownName(to), screens::folderTitle(folder)});
+}
 
 void reloadPreview()
 {
@@ -140,8 +163,10 @@ void PreviewItemManager::presentedItemDidMoveToURL(const Url& newURL)
     const auto real = items.realURL(newURL);
     const auto url = itemURL();
     op.info("presentedItemDidMoveToURL: %@ changed to %@", url, real);
-    if (items.isInTrash(real) || !items.isInDocumentsArea(real))
-        return accommodatePresentedItemDeletionWithCompletionHandler([](const auto&) {});
+    if (items.isInTrash(real))
+        return leaveItem(deletedNotice(url));
+    if (!items.isInDocumentsArea(real))
+        return leaveItem(localized("“%@” was moved out of the drive", {shownName(url)}));
     if (url && url->path() == real.path()) {
         op.warning("UNEXPECTED: duplicate calls to presentedItemDidMoveToURL: %@", real.path());
         return;
@@ -156,29 +181,45 @@ void PreviewItemManager::followTo(const Url& url)
     const auto navigation = navigationController();
     const bool isPeekedAt = filePresenterRegistered() && navigation
         && !isPreviewControllerDisplayed(navigation->topViewController());
-    if (isPeekedAt)
+    if (isPeekedAt) {
         prepareToPreviewItem(DRItem::initWithURL(url));
-    else
-        warpToNewURL(url);
+        return;
+    }
+    const auto before = itemURL();
+    const auto window = navigation ? navigation->window() : nullptr;
+    if (warpToNewURL(url) && window && before)
+        window->showNotice(movedNotice(*before, url));
 }
 
 void PreviewItemManager::accommodatePresentedItemDeletionWithCompletionHandler(CompletionHandler completion)
 {
     static constexpr Operation op{
         "-[PreviewItemManager accommodatePresentedItemDeletionWithCompletionHandler:]"};
-    op.info("Accommodate deletion: %@", itemURL());
+    const auto url = itemURL();
+    op.info("Accommodate deletion: %@", url);
     completion(std::nullopt);
+    leaveItem(deletedNotice(url));
+}
+
+void PreviewItemManager::leaveItem(const std::string& notice)
+{
     unregisterAsFilePresenter();
-    services().dispatch().mainQueue()->async(weakly(this, &PreviewItemManager::popPreview));
+    services().dispatch().mainQueue()->async(weakly(this, &PreviewItemManager::popPreview, notice));
 }
 
 /// Takes the preview off the stack. A preview that was only prepared, or was left meanwhile, has no screen
 /// there.
-void PreviewItemManager::popPreview()
+void PreviewItemManager::popPreview(const std::string& notice)
 {
     const auto navigation = navigationController();
-    if (navigation && isPreviewControllerDisplayed(navigation->topViewController()))
-        navigation->popViewController(true);
+    if (!navigation || !isPreviewControllerDisplayed(navigation->topViewController()))
+        return;
+    // What lies over the preview asks about the item that has gone.
+    if (navigation->presentedViewController())
+        navigation->dismissViewController(false);
+    navigation->popViewController(true);
+    if (const auto window = navigation->window())
+        window->showNotice(notice);
 }
 
 void PreviewItemManager::accommodatePresentedSubitemDeletionAtURLCompletionHandler(

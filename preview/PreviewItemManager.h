@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "items/AccountSession.h"
 #include "kit/controllers/NavigationController.h"
 #include "kit/controllers/ViewController.h"
 #include "platform/Date.h"
@@ -137,7 +138,9 @@ private:
     std::optional<platform::Url> itemURL() const;
     void keepItem(const std::shared_ptr<DRItem>& item);
     void followTo(const platform::Url& url);
-    void popPreview();
+    /// Forgets the item, which is gone from where it was shown, and tells the user why.
+    void leaveItem(const std::string& notice);
+    void popPreview(const std::string& notice);
     void refreshAfterSubitemDeletion();
     void clearRefreshPending();
     void refreshScreens(const DRItem& item, bool isElsewhere, bool isNewer, bool wasDownloaded);
@@ -151,6 +154,7 @@ private:
     std::shared_ptr<screens::DocumentInteractionSheet> _documentInteractionController;
     std::weak_ptr<kit::NavigationController> _navigationController;
     std::vector<platform::Observation> _observations;
+    std::optional<AccountSession> _moveAsked; ///< who was asked last for the destination of a move
 
     mutable std::mutex _mutex; ///< guards the fields below
     std::shared_ptr<DRItem> _item;

@@ -5,11 +5,13 @@
 
 #include "kit/controllers/AlertAction.h"
 #include "kit/controllers/AlertController.h"
+#include "kit/controllers/Window.h"
 #include "kit/views/ListView.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/Weakly.h"
+#include "screens/DisplayName.h"
 #include "screens/ErrorWords.h"
 #include "screens/list/DocumentPeek.h"
 #include "screens/list/DocumentRowSource.h"
@@ -248,6 +250,7 @@ bool DocumentListController::rowHeld(kit::ListView& list, std::size_t index)
     const auto title = _listView->row(index).title;
     const auto peek = DocumentPeek::make(title, screen, menuForRow(list, index), open);
     _peek = peek;
+    _peekedItem = url;
     presentViewController(peek, true);
     return true;
 }
@@ -257,6 +260,21 @@ void DocumentListController::heldRowPressedOn(kit::ListView&)
     const auto peek = _peek.lock();
     if (peek && presentedViewController() == peek)
         peek->press(peek->preferredAction());
+}
+
+void DocumentListController::endPeekAtMissingItem()
+{
+    const auto peek = _peek.lock();
+    if (!peek || !peek->presentingViewController())
+        return;
+    const auto& rows = *_contents->rows();
+    if (std::ranges::find(rows.ids(), rows.idFor(*_peekedItem)) != rows.ids().end())
+        return;
+    const auto shown = window();
+    peek->dismissViewController(false);
+    if (shown)
+        shown->showNotice(
+            localized("“%@” is no longer there.", {displayName(_peekedItem->lastPathComponent())}));
 }
 
 void DocumentListController::openFromPeek(const Url& url, FolderEntryKind kind)

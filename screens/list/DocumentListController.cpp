@@ -207,8 +207,11 @@ void DocumentListController::contentsDidChange(const FolderContentsUpdate& updat
         _listView->apply(update.changes);
     }
     _rows->visibleRowsDidChange();
-    if (update.stage != ListingStage::FirstRows)
+    if (update.stage != ListingStage::FirstRows) {
         _listView->endRefreshing();
+        if (!update.error)
+            endPeekAtMissingItem();
+    }
     showStateOfFolder();
     takeKeyboard();
     if (const auto told = delegate())
@@ -221,12 +224,15 @@ void DocumentListController::showStateOfFolder()
 {
     const bool isEmpty = containedItemCount() == 0;
     _placeholder->setHidden(!isEmpty || _state == ListingStage::FirstRows);
+    _placeholder->setActions({});
     if (!isEmpty) {
         navigationItem().setSubtitle(_failure ? localized("Some items could not be read") : std::string());
     } else if (_failure) {
         _placeholder->setContent({.iconName = "dialog-warning-symbolic",
             .title = localized("This folder cannot be shown"),
             .message = errorWords(*_failure)});
+        _placeholder->setActions(
+            {{localized("Try Again"), weakly(this, &DocumentListController::refresh), true}});
     } else {
         _placeholder->setContent({.iconName = "folder-open-symbolic",
             .title = localized("Folder is empty"),

@@ -149,12 +149,15 @@ private:
     void download(const Url& url);
     /// Answers the place of an item's row for a popover, or the list itself when the row is not visible.
     std::shared_ptr<kit::View> anchorFor(const Url& url);
+    /// Ends the peek at an item that the folder no longer has.
+    void endPeekAtMissingItem();
     void openFromPeek(const Url& url, FolderEntryKind kind);
     /// Answers whether an action is enabled and applies to this kind of item.
     bool offers(DocumentListAction action, FolderEntryKind kind) const;
 
     std::optional<Url> _presentedURL;
     std::weak_ptr<kit::AlertController> _peek; ///< the latest peek
+    std::optional<Url> _peekedItem; ///< the item of the latest peek
     std::weak_ptr<DocumentListControllerDelegate> _delegate;
     std::shared_ptr<kit::ListView> _listView;
     std::shared_ptr<PlaceholderView> _placeholder;

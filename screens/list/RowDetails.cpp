@@ -5,10 +5,12 @@
 
 #include "platform/CloudDocumentService.h"
 #include "platform/FileCoordinator.h"
+#include "platform/FileSystem.h"
 #include "platform/Formatters.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "screens/DetailText.h"
+#include "screens/DisplayName.h"
 
 #include <filesystem>
 #include <system_error>
@@ -42,10 +44,19 @@ std::optional<std::int64_t> numberOfItems(const Url& folder)
     return error ? std::nullopt : std::optional(count);
 }
 
+/// Answers where a symbolic link leads, by the name that it holds; the target itself is not looked at.
+std::string linkText(const Url& link)
+{
+    const auto target = services().fileSystem().destinationOfSymbolicLink(link.path());
+    const auto name =
+        target ? std::filesystem::path(*target.value).lexically_normal().filename().native() : "";
+    return name.empty() ? localized("Link") : localized("Link to “%@”", {displayName(name)});
+}
+
 std::string sizeText(const Url& url, FolderEntryKind kind, const AttributeMap& values)
 {
     if (kind == FolderEntryKind::Link)
-        return localized("Link");
+        return linkText(url);
     if (opensAsFolder(kind)) {
         const auto count = numberOfItems(url);
         return count ? localizedPlural(".DICT.ITEMS.%d", {*count}) : std::string();

@@ -107,14 +107,18 @@ TEST_F(NavigationTest, LinksAreFollowedOneStepInsideTheDrive)
         std::string target;
         std::vector<std::string> expectedStack;
         const char* log;
+        std::string notice{};
     };
     const std::vector<std::string> unmoved{top};
     const Row rows[] = {
         {"document", "Folder/note.txt", {top, "*"}, ""},
         {"folder", "Folder", {top, "Folder"}, "DEBUG Building DLC stack for symlink to "},
-        {"outside", outside, unmoved, "DEBUG DLC Selection is symlink to outside target: "},
-        {"dangling", "Folder/nothing", unmoved, "DLC Selection is symlink"},
-        {"second-step-outside", "outside", unmoved, "DEBUG DLC Selection is symlink to"},
+        {"outside", outside, unmoved, "DEBUG DLC Selection is symlink to outside target: ",
+            "“outside” leads to a place outside the drive."},
+        {"dangling", "Folder/nothing", unmoved, "DLC Selection is symlink",
+            "“dangling” leads to something that is not there."},
+        {"second-step-outside", "outside", unmoved, "DEBUG DLC Selection is symlink to",
+            "“second-step-outside” leads to a place outside the drive."},
         {"itself", "itself", {top, "i"}, ""},
     };
     launch();
@@ -125,6 +129,7 @@ TEST_F(NavigationTest, LinksAreFollowedOneStepInsideTheDrive)
         tap(url(row.name));
         EXPECT_EQ(stack(), row.expectedStack);
         EXPECT_THAT(log->lines(), testing::Contains(testing::HasSubstr(row.log)));
+        EXPECT_EQ(takeNotices(), row.notice.empty() ? std::vector<std::string>() : std::vector{row.notice});
         browser->popToRootViewController(false);
         settle();
     }
@@ -198,6 +203,7 @@ TEST_F(NavigationTest, ARemovedFolderIsLeft)
     topList()->refresh();
     settle();
     EXPECT_THAT(stack(), ElementsAre(top));
+    EXPECT_THAT(takeNotices(), ElementsAre("“Folder” is no longer there."));
 }
 
 TEST_F(NavigationTest, APeekShowsFoldersAndDocuments)

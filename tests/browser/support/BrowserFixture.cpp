@@ -18,6 +18,23 @@ namespace testing_support {
 using kit::Window;
 using screens::DocumentListController;
 
+/// A host that shows no movements and keeps the window's messages.
+class ShownNotices : public kit::WindowObserver {
+public:
+    void rootDidChange(Window&) override { }
+    void windowWillPresent(Window&, const kit::Presentation&, kit::TransitionToken token) override
+    {
+        token.finish();
+    }
+    void windowWillDismiss(Window&, const kit::Presentation&, kit::TransitionToken token) override
+    {
+        token.finish();
+    }
+    void windowShowsNotice(Window&, const std::string& text) override { texts.push_back(text); }
+
+    std::vector<std::string> texts;
+};
+
 BrowserFixture::BrowserFixture()
 {
     cloud = std::make_shared<SimulatedCloud>(drive.cloud);
@@ -35,6 +52,8 @@ void BrowserFixture::launchWithoutListing()
 {
     browser = std::make_shared<tarrow::NavController>();
     window = std::make_shared<Window>(platform::Rect{0, 0, 400, 800});
+    notices = std::make_shared<ShownNotices>();
+    window->setObserver(notices);
     window->setRootViewController(browser);
     window->makeKeyAndVisible();
 }
@@ -76,6 +95,11 @@ std::vector<std::string> BrowserFixture::stack() const
 std::shared_ptr<kit::AlertController> BrowserFixture::alert() const
 {
     return std::dynamic_pointer_cast<kit::AlertController>(browser->presentedViewController());
+}
+
+std::vector<std::string> BrowserFixture::takeNotices()
+{
+    return std::exchange(notices->texts, {});
 }
 
 std::string BrowserFixture::itemsText(std::size_t count)

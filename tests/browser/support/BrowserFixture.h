@@ -23,6 +23,8 @@ class Window;
 
 namespace testing_support {
 
+class ShownNotices;
+
 /// A browser in a window, on the real store in a temporary folder. Only the account's token, the quota, the
 /// storage offers, other apps and the clock are simulated.
 class BrowserFixture : public testing::Test {
@@ -52,6 +54,8 @@ protected:
     /// and "-" for another screen.
     std::vector<std::string> stack() const;
     std::shared_ptr<kit::AlertController> alert() const;
+    /// Answers what the window told the user since the last call.
+    std::vector<std::string> takeNotices();
     /// Answers the catalogue's text for a number of items.
     static std::string itemsText(std::size_t count);
 
@@ -61,6 +65,7 @@ protected:
     std::shared_ptr<SimulatedCloud> cloud;
     std::shared_ptr<SimulatedApps> apps = std::make_shared<SimulatedApps>();
     std::shared_ptr<SimulatedOffers> offers = std::make_shared<SimulatedOffers>();
+    std::shared_ptr<ShownNotices> notices;
     std::shared_ptr<kit::Window> window;
     std::shared_ptr<tarrow::NavController> browser;
 };

@@ -54,7 +54,7 @@ TEST_F(DocumentList, ShowsEveryKindOfItemWithItsDetails)
         {{"Letter.pages", Kind::Package}, ""},
         {{"Notes.txt"}, "2 KB"},
         {{"Ours.txt"}, "3 bytes · Shared"},
-        {{"Pointer", Kind::Link}, "Link"},
+        {{"Pointer", Kind::Link}, "Link to “Notes.txt”"},
     };
     HandLister::Entries entries;
     for (const auto& row : rows)
