@@ -67,6 +67,12 @@ GtkWidget* ListViewPeer::focusedRow() const
     return row && ListRowWidget::isRow(row) ? row : nullptr;
 }
 
+std::optional<std::size_t> ListViewPeer::focusedIndex() const
+{
+    auto* row = focusedRow();
+    return row ? std::optional<std::size_t>(ListRowWidget::position(row)) : std::nullopt;
+}
+
 GtkWidget* ListViewPeer::rowAt(double x, double y) const
 {
     auto* found = gtk_widget_pick(native(), x, y, GTK_PICK_DEFAULT);
@@ -196,8 +202,7 @@ bool ListViewPeer::typedAhead(guint key, GdkModifierType modifiers)
     std::array<char, 6> bytes;
     const auto length = static_cast<std::size_t>(g_unichar_to_utf8(typed, bytes.data()));
     _typeAhead.type({bytes.data(), length}, now);
-    auto* row = focusedRow();
-    const std::size_t focused = row ? ListRowWidget::position(row) : 0;
+    const auto focused = focusedIndex().value_or(0);
     if (const auto found = list->rowBeginningWith(_typeAhead.sought(), _typeAhead.start(focused)))
         list->focusRow(*found);
     return true;

@@ -305,8 +305,7 @@ void ListViewPeer::growRows()
 
 void ListViewPeer::rowsWereReset(kit::ListView& list)
 {
-    auto* focused = focusedRow();
-    const auto focusedAt = focused ? std::optional(ListRowWidget::position(focused)) : std::nullopt;
+    const auto focusedAt = focusedIndex();
     RowModel::reset(_rows.get(), 0);
     showRows(list.rowCount());
     fillAllSoon();
@@ -316,8 +315,7 @@ void ListViewPeer::rowsWereReset(kit::ListView& list)
 
 void ListViewPeer::rowsDidChange(kit::ListView& list, const kit::ListChanges& changes)
 {
-    auto* focused = focusedRow();
-    const auto focusedAt = focused ? std::optional(ListRowWidget::position(focused)) : std::nullopt;
+    const auto focusedAt = focusedIndex();
     // A list that still grows has only its beginning in the widgets, so those rows are filled again instead.
     if (g_list_model_get_n_items(_rows.get()) == rowCountBefore(list, changes))
         splice(list, changes);

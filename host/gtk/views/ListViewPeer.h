@@ -91,6 +91,7 @@ private:
     bool typedAhead(guint key, GdkModifierType modifiers);
     bool isShiftHeld() const;
     GtkWidget* focusedRow() const;
+    std::optional<std::size_t> focusedIndex() const;
     GtkWidget* rowAt(double x, double y) const;
     /// Gives the keyboard focus to a row as soon as it has a widget.
     void focusSoon(std::size_t index, int frames);
