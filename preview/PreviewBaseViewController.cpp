@@ -24,7 +24,6 @@
 namespace tarrow {
 
 using kit::BarButtonItem;
-using kit::BarButtonItems;
 using kit::InterfaceOrientation;
 using kit::LayoutConstraint;
 using kit::SizeClass;

@@ -116,7 +116,7 @@ TEST_F(AppDelegateTest, ALaunchWithAShortcutHandlesItOnce)
 
 TEST_F(AppDelegateTest, PathsAndQueriesAreDecodedTwiceAndTheLastModeWins)
 {
-    const auto expectedPath = "/path/to/My Doc.txt";
+    const auto* const expectedPath = "/path/to/My Doc.txt";
     struct Row {
         const char* text;
         const char* path; ///< empty: no target
@@ -271,7 +271,7 @@ TEST_F(AppDelegateTest, ASearchResultIsFoundByItsNumber)
     }
     EXPECT_TRUE(goOn(platform::activityType::searchableItem));
 
-    UserActivity found{std::string(platform::activityType::searchableItem), {{key, identifier}}};
+    const UserActivity found{std::string(platform::activityType::searchableItem), {{key, identifier}}};
     EXPECT_TRUE(app->applicationContinueUserActivityRestorationHandler(application, found, {}));
     EXPECT_THAT(stack(), ElementsAre(top)) << "the browser is only led there on the main queue's next turn";
     settle();

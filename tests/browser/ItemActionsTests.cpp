@@ -65,7 +65,7 @@ TEST_F(ItemActionsTest, ItemsFollowIntoTheFolderThatIsMadeForThem)
 {
     const auto a = write("a.txt"), b = write("b.txt");
     launch();
-    browser->showNewFolderPromptDuringMoveItemsToMove(*topList()->presentedURL(), {a, b});
+    browser->showNewFolderPromptDuringMoveItemsToMove(topList()->presentedURL(), {a, b});
     EXPECT_EQ(alert()->title(), "Move 2 Items");
     EXPECT_EQ(alert()->actions()[1]->title(), "Move");
     EXPECT_EQ(enter("Desktop"), "Name is already taken");
@@ -75,7 +75,7 @@ TEST_F(ItemActionsTest, ItemsFollowIntoTheFolderThatIsMadeForThem)
 
     const auto c = write("c.txt");
     browser->showNewFolderPromptDuringMoveItemsToMove(
-        *topList()->presentedURL(), {url("gone.txt"), c, url("lost.txt")});
+        topList()->presentedURL(), {url("gone.txt"), c, url("lost.txt")});
     EXPECT_EQ(enter("Some"), "2 items couldn’t be moved.");
     EXPECT_NE(alert(), nullptr) << "it stays over the new folder";
     EXPECT_TRUE(isThere("Some/c.txt")) << "a failure does not stop the others";

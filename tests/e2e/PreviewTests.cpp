@@ -49,7 +49,7 @@ TEST_F(PreviewTests, PicturesAndPagesSayWhatTheyAre)
     const auto isShown = [this](AtspiRole role, const std::string& name) {
         return !program
                     ->all([&](const Accessible& node) {
-                        return node.hasRole(role) && node.name().compare(0, name.size(), name) == 0;
+                        return node.hasRole(role) && node.name().starts_with(name);
                     })
                     .empty();
     };

@@ -23,7 +23,7 @@ constexpr unsigned controlKeycode = 37, shiftKeycode = 50; ///< codes of every P
 
 bool begins(const std::string& text, const std::string& beginning)
 {
-    return text.compare(0, beginning.size(), beginning) == 0;
+    return text.starts_with(beginning);
 }
 
 /// Starts a command with a changed environment. What it writes to its standard error goes to a file, unless
@@ -72,6 +72,7 @@ Program::Program(const Environment& changes)
     })) << "the program did not come up";
 }
 
+// NOLINTNEXTLINE(bugprone-exception-escape): an exception would end the test here as well
 Program::~Program()
 {
     if (_process)

@@ -15,8 +15,8 @@ namespace e2e {
 /// returns once the server has passed the event on.
 class TouchScreen {
 public:
-    /// `socket` is that of the server's touch device. `width` and `height` are the display's.
-    TouchScreen(const std::string& socket, double width, double height);
+    /// `path` is that of the server's touch device. `width` and `height` are the display's.
+    TouchScreen(const std::string& path, double width, double height);
     ~TouchScreen();
     TouchScreen(const TouchScreen&) = delete;
     TouchScreen& operator=(const TouchScreen&) = delete;

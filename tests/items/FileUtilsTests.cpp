@@ -43,7 +43,7 @@ TEST_F(FileUtilsTest, AsksTheContainerForTheTypesItTakes)
              Row{taking("\"" + text + "\""), "a.txt", true},
              Row{taking("\"public.text\""), "a.txt", true},
              Row{taking("\"public.image\", 7"), "a.txt", false},
-             Row{taking("\"public.image\", \"public.data\""), "a.txt", true},
+             Row{taking(R"("public.image", "public.data")"), "a.txt", true},
              Row{taking("\"public.content\""), "a.png", true},
              Row{taking("\"public.image\""), "a", true},
              Row{taking("\"public.image\""), "a.no such kind", true},

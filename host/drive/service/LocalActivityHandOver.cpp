@@ -18,7 +18,6 @@ namespace host::drive {
 
 namespace {
 
-using platform::ActivityOffer;
 using platform::Date;
 using platform::weakly;
 

@@ -11,6 +11,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 namespace kit {
 
 namespace {
@@ -251,7 +253,7 @@ TEST_F(Screens, LieOverEachOtherAndGoTogether)
     EXPECT_TRUE(done);
     EXPECT_EQ(window->presentedScreens().size(), 0);
     const auto left = take();
-    EXPECT_EQ(std::count(left.begin(), left.end(), "full did go"), 1);
+    EXPECT_EQ(std::ranges::count(left, "full did go"), 1);
     EXPECT_EQ(left.back(), "sheet did go");
     EXPECT_FALSE(full->isVisible());
 

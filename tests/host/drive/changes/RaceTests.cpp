@@ -18,7 +18,6 @@ namespace fs = std::filesystem;
 
 using namespace host::drive;
 using host::system::FileDescriptor;
-using platform::Url;
 using testing_support::contentOf;
 
 /// Is called between the check of a document and its removal or move, because the document has a promise

@@ -280,7 +280,7 @@ TEST_F(DamagedIndexTests, cutOffAtAnyByte)
         if (length % 256 != 0)
             continue;
         _drive.settle();
-        DocumentIndex index(_drive.layout().index());
+        const DocumentIndex index(_drive.layout().index());
         ASSERT_EQ(index.state(), DocumentIndex::State::Complete) << length;
         ASSERT_EQ(index.lookUp(_identifier).kind, Kind::Known) << length;
     }

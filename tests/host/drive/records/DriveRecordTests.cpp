@@ -76,7 +76,7 @@ TEST(PromiseRecordTests, aFieldThatCannotBeRightIsUnknown)
     ASSERT_TRUE(record);
     EXPECT_FALSE(record->modified);
     EXPECT_FALSE(record->role);
-    EXPECT_EQ(record->documentIdentifier, 0u);
+    EXPECT_EQ(record->documentIdentifier, 0U);
     EXPECT_THAT(record->tags, ElementsAre("a"));
     EXPECT_EQ(record->kind, PromiseRecord::Kind::File);
     EXPECT_FALSE(record->shared);

@@ -37,7 +37,7 @@ TEST_F(SampleDriveTests, addsEveryKindOfItemToWhatIsThere)
     EXPECT_EQ(makeSampleDrive(layout()).written, 0);
     EXPECT_EQ(testing_support::contentOf(mine), "mine");
     EXPECT_EQ(host::drive::AccountRecord::read(layout())->identity, "account-1");
-    EXPECT_GE(cloud->containers().allContainers().size(), 3u);
+    EXPECT_GE(cloud->containers().allContainers().size(), 3U);
 
     std::set<std::string> kinds, tags;
     std::uintmax_t promised = 0, stored = 0;
@@ -71,7 +71,7 @@ TEST_F(SampleDriveTests, addsEveryKindOfItemToWhatIsThere)
         if (isPromised)
             promised += reading.values->optional<std::uint64_t>(AttributeKey::FileSize).value_or(0);
     }
-    EXPECT_EQ(kinds.size(), 16u) << PrintToString(kinds);
+    EXPECT_EQ(kinds.size(), 16U) << PrintToString(kinds);
     for (const auto& entry : fs::directory_iterator(layout().cloud()))
         stored += entry.file_size();
     EXPECT_EQ(promised, stored) << "what is promised lies in the cloud";

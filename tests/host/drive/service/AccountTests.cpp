@@ -101,7 +101,7 @@ TEST_F(AccountTests, quotaIsTheFreeSpaceOrTheSystemsError)
         std::vector<Result<std::int64_t>> answers;
         _drive.cloud->account().makeQuotaFetchOperation(
             [&](Result<std::int64_t> answer) { answers.push_back(std::move(answer)); })();
-        EXPECT_EQ(answers.size(), 1u);
+        EXPECT_EQ(answers.size(), 1U);
         return answers.front();
     };
     const auto space = std::filesystem::space(_drive.layout().home());

@@ -79,7 +79,7 @@ TEST_F(ContainerTests, describedByTheirFileAsItIsNow)
     const auto container = *containers().containerForItem(folder);
     EXPECT_EQ(container->localizedName, "Notebook");
     EXPECT_EQ(container->documentsURL, folder);
-    ASSERT_EQ(container->documentTypes.size(), 1u);
+    ASSERT_EQ(container->documentTypes.size(), 1U);
     EXPECT_EQ(container->documentTypes[0].contentTypes, record.documentTypes[0].contentTypes);
     EXPECT_EQ(container->supportedFolderLevels, "one");
     EXPECT_EQ(container->owningApps, record.owningApps);

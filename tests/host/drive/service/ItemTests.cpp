@@ -101,7 +101,7 @@ TEST_F(ItemTests, marksOfALocalItem)
     EXPECT_EQ(marked.optional<platform::SharedItemRole>(AttributeKey::SharedItemRole),
         platform::SharedItemRole::Owner);
     EXPECT_TRUE(marked.flag(AttributeKey::IsShared));
-    EXPECT_EQ(marked.optional<std::uint64_t>(AttributeKey::DocumentIdentifier), 4'294'967'295u);
+    EXPECT_EQ(marked.optional<std::uint64_t>(AttributeKey::DocumentIdentifier), 4'294'967'295U);
     EXPECT_TRUE(marked.flag(AttributeKey::HasHiddenExtension));
     EXPECT_EQ(marked.optional<std::string>(AttributeKey::LocalizedName), "Report.final");
 
@@ -241,7 +241,7 @@ TEST_F(ItemTests, theRealItemCountsWhereBothExist)
     const auto url = _drive.writeDocument("Plan.pdf", "real");
     EXPECT_TRUE(items().physicalURLForPromise(url).isSameObject(url));
     const auto found = values(url);
-    EXPECT_EQ(found.optional<std::uint64_t>(AttributeKey::FileSize), 4u);
+    EXPECT_EQ(found.optional<std::uint64_t>(AttributeKey::FileSize), 4U);
     EXPECT_FALSE(found.has(AttributeKey::DownloadingStatus));
     EXPECT_TRUE(items().readItem(url, {}).tagNames.empty());
 

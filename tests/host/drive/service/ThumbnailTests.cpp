@@ -43,15 +43,15 @@ TEST_F(ThumbnailTests, madeInTheBackgroundWhenTheMainThreadAsks)
     _drive.settle();
     const auto made = thumbnails(picture);
     ASSERT_TRUE(made);
-    ASSERT_EQ(made->size(), 1u);
+    ASSERT_EQ(made->size(), 1U);
     EXPECT_EQ(made->front().pixelSize, 1024);
     EXPECT_EQ(made->front().image.pixelWidth(), 1024);
     EXPECT_EQ(made->front().image.pixelHeight(), 768);
 
-    ASSERT_EQ(entries().size(), 1u);
+    ASSERT_EQ(entries().size(), 1U);
     struct stat status { };
     ASSERT_EQ(::stat(entries().front().c_str(), &status), 0);
-    EXPECT_EQ(status.st_mode & 0777, 0600u) << "thumbnails are private";
+    EXPECT_EQ(status.st_mode & 0777, 0600U) << "thumbnails are private";
 
     // The file has another version now, so the old thumbnail no longer counts.
     std::filesystem::last_write_time(
@@ -59,7 +59,7 @@ TEST_F(ThumbnailTests, madeInTheBackgroundWhenTheMainThreadAsks)
     EXPECT_FALSE(thumbnails(picture));
     _drive.settle();
     EXPECT_TRUE(thumbnails(picture));
-    EXPECT_EQ(entries().size(), 1u);
+    EXPECT_EQ(entries().size(), 1U);
 }
 
 TEST_F(ThumbnailTests, madeAtOnceForAThreadInTheBackground)

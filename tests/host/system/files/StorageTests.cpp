@@ -68,7 +68,7 @@ TEST_F(UserDefaultsTest, KeepsValuesBetweenRunsAndWritesManyChangesAtOnce)
 
 TEST_F(UserDefaultsTest, DamagedFileIsKeptAsideAndNamedInTheLog)
 {
-    for (const std::string damaged : {"", "{\"version\":1", "[]", "{\"version\":1,\"values\":[]}"}) {
+    for (const std::string damaged : {"", "{\"version\":1", "[]", R"({"version":1,"values":[]})"}) {
         directory.write("defaults.json", damaged);
         log->clear();
         const auto defaults = open();
@@ -83,7 +83,7 @@ TEST_F(UserDefaultsTest, DamagedFileIsKeptAsideAndNamedInTheLog)
 
 TEST_F(UserDefaultsTest, FileThatMustNotBeTouchedIsNotOverwritten)
 {
-    const std::string newer = "{\"version\":2,\"values\":{},\"more\":1}";
+    const std::string newer = R"({"version":2,"values":{},"more":1})";
     directory.write("defaults.json", newer);
     open()->setData("token", bytes("x"));
     EXPECT_EQ(content(path), newer);
@@ -158,11 +158,11 @@ TEST(JsonKeyedArchiver, RefusesWhatIsTooLargeTooDeepNewerOrMalformed)
     EXPECT_FALSE(archiver.unarchive(archiver.archive(std::string(66'000, 'x'))));
     const std::string open(30'000, '[');
     for (const std::string& text : {std::string(), open, std::string("{}"), std::string("{\"root\":1}"),
-             std::string("{\"version\":2,\"root\":1}"), std::string("{\"version\":1,\"root\":1} x"),
-             std::string("{\"version\":1,\"root\":{\"$\":\"thing\",\"v\":\"\"}}"),
-             std::string("{\"version\":1,\"root\":{\"$\":\"data\",\"v\":\"A*==\"}}"),
-             std::string("{\"version\":1,\"root\":{\"$\":\"url\",\"v\":\"nowhere\"}}"),
-             std::string("{\"version\":1,\"root\":{\"$\":1,\"v\":1}}")})
+             std::string(R"({"version":2,"root":1})"), std::string(R"({"version":1,"root":1} x)"),
+             std::string(R"({"version":1,"root":{"$":"thing","v":""}})"),
+             std::string(R"({"version":1,"root":{"$":"data","v":"A*=="}})"),
+             std::string(R"({"version":1,"root":{"$":"url","v":"nowhere"}})"),
+             std::string(R"({"version":1,"root":{"$":1,"v":1}})")})
         EXPECT_FALSE(archiver.unarchive(bytes(text))) << text.substr(0, 60);
 }
 
