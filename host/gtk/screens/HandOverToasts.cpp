@@ -3,6 +3,7 @@
 
 #include "host/gtk/screens/HandOverToasts.h"
 
+#include "host/gtk/screens/ToastTitle.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
 #include "platform/Localization.h"
@@ -30,21 +31,13 @@ std::string keyOf(const ActivityOffer& offer)
     return offer.deviceIdentifier + '\n' + offer.document.path();
 }
 
-/// Makes a title of several lines, because a toast's own title has one line, in which a phone would show
-/// neither the name nor the device in full.
 GtkWidget* makeTitle(const ActivityOffer& offer)
 {
     using screens::displayName;
-    const auto text = platform::localized(
-        "“%1$@” on %2$@", {displayName(offer.document.lastPathComponent()), displayName(offer.deviceName)});
-    auto* title = gtk_label_new(text.c_str());
-    gtk_label_set_wrap(GTK_LABEL(title), TRUE);
-    gtk_label_set_wrap_mode(GTK_LABEL(title), PANGO_WRAP_WORD_CHAR);
-    gtk_label_set_lines(GTK_LABEL(title), titleLines);
-    gtk_label_set_ellipsize(GTK_LABEL(title), PANGO_ELLIPSIZE_END);
-    gtk_label_set_xalign(GTK_LABEL(title), 0);
-    gtk_widget_add_css_class(title, "heading");
-    return title;
+    return makeToastTitle(
+        platform::localized("“%1$@” on %2$@",
+            {displayName(offer.document.lastPathComponent()), displayName(offer.deviceName)}),
+        titleLines);
 }
 
 std::string bookmarkOf(const UserActivity& activity)

@@ -6,6 +6,7 @@
 #include "host/gtk/preview/NotePeer.h"
 #include "host/gtk/preview/PreviewPeer.h"
 #include "host/gtk/screens/LayerFactory.h"
+#include "host/gtk/screens/ToastTitle.h"
 #include "kit/controllers/ViewController.h"
 #include "platform/Localization.h"
 #include "platform/Weakly.h"
@@ -250,8 +251,10 @@ void WindowPeer::windowWillDismiss(
 
 void WindowPeer::windowShowsNotice(kit::Window&, const std::string& text)
 {
-    const std::unique_ptr<char, decltype(&g_free)> title(g_markup_escape_text(text.c_str(), -1), &g_free);
-    adw_toast_overlay_add_toast(_toasts, adw_toast_new(title.get()));
+    constexpr int lines = 3;
+    auto* toast = adw_toast_new("");
+    adw_toast_set_custom_title(toast, makeToastTitle(text, lines));
+    adw_toast_overlay_add_toast(_toasts, toast);
 }
 
 /// The layer is kept alive a little longer, because this is called from one of its own signals.
