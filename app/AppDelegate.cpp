@@ -12,11 +12,13 @@
 #include "kit/values/Screen.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
+#include "platform/Localization.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/UserDefaults.h"
 #include "platform/Weakly.h"
 #include "preview/PreviewMode.h"
+#include "screens/DisplayName.h"
 
 namespace tarrow {
 
@@ -66,6 +68,19 @@ std::optional<Url> recentDocument(const PropertyDictionary& information)
     if (number && isNumber(*number))
         return documentWithNumber(*number);
     return archivedURL(information, platform::RecentDocumentURLKey);
+}
+
+/// Says why a URL from outside opened nothing.
+std::string refusal(const std::optional<SchemeEntry>& entry)
+{
+    if (!entry || !entry->target)
+        return platform::localized("This address cannot be opened.");
+    const auto& items = services().cloudDocumentService().items();
+    const auto name = screens::displayName(entry->target->lastPathComponent());
+    if (!items.isInDocumentsArea(*entry->target))
+        return platform::localized("“%@” lies outside the drive.", {name});
+    return items.isInTrash(*entry->target) ? platform::localized("“%@” was deleted", {name})
+                                           : platform::localized("“%@” is no longer there.", {name});
 }
 
 } // namespace
@@ -140,7 +155,10 @@ bool AppDelegate::applicationOpenURLOptions(
     op.userAction("AppDelegate: openURL");
     op.info("openURL: %@, options %{public}@, app %{public}@", url, options, "Tarrow Drive");
     const auto entry = SchemeEntry::parse(url);
-    return entry && warpTo(entry->target, entry->previewMode);
+    const bool isShown = entry && warpTo(entry->target, entry->previewMode);
+    if (!isShown && isSignedIn())
+        _rootWindow->showNotice(refusal(entry));
+    return isShown;
 }
 
 void AppDelegate::applicationPerformActionForShortcutItemCompletionHandler(

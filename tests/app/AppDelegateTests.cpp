@@ -172,11 +172,22 @@ TEST_F(AppDelegateTest, BadURLsAreRefusedAndNothingMoves)
                 deep += "/a";
             return deep;
         }()};
+    watch(*app->rootWindow());
     for (const auto& row : rows) {
         SCOPED_TRACE(row.substr(0, 200));
         EXPECT_FALSE(open(row));
         EXPECT_THAT(stack(), ElementsAre(top));
+        EXPECT_EQ(takeNotices().size(), 1);
     }
+    open(schemeURL("Folder/gone.txt"));
+    open("tarrowdriveapp:///etc/passwd");
+    open("javascript:alert(1)");
+    EXPECT_THAT(takeNotices(),
+        ElementsAre("“gone.txt” is no longer there.", "“passwd” lies outside the drive.",
+            "This address cannot be opened."));
+    cloud->token = std::nullopt;
+    open(schemeURL("Folder/gone.txt"));
+    EXPECT_THAT(takeNotices(), testing::IsEmpty()) << "the screen says enough";
 }
 
 TEST_F(AppDelegateTest, URLsOpenItemsOfTheDrive)

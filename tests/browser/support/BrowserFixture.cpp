@@ -52,8 +52,7 @@ void BrowserFixture::launchWithoutListing()
 {
     browser = std::make_shared<tarrow::NavController>();
     window = std::make_shared<Window>(platform::Rect{0, 0, 400, 800});
-    notices = std::make_shared<ShownNotices>();
-    window->setObserver(notices);
+    watch(*window);
     window->setRootViewController(browser);
     window->makeKeyAndVisible();
 }
@@ -95,6 +94,12 @@ std::vector<std::string> BrowserFixture::stack() const
 std::shared_ptr<kit::AlertController> BrowserFixture::alert() const
 {
     return std::dynamic_pointer_cast<kit::AlertController>(browser->presentedViewController());
+}
+
+void BrowserFixture::watch(kit::Window& shown)
+{
+    notices = std::make_shared<ShownNotices>();
+    shown.setObserver(notices);
 }
 
 std::vector<std::string> BrowserFixture::takeNotices()

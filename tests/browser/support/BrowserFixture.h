@@ -54,6 +54,8 @@ protected:
     /// and "-" for another screen.
     std::vector<std::string> stack() const;
     std::shared_ptr<kit::AlertController> alert() const;
+    /// Keeps what a window tells the user from now on.
+    void watch(kit::Window& shown);
     /// Answers what the window told the user since the last call.
     std::vector<std::string> takeNotices();
     /// Answers the catalogue's text for a number of items.
