@@ -23,12 +23,16 @@ protected:
     {
         return {
             {"a row's menu", [this] { program->buttons("To do.txt").back().perform("row.menu"); }, "Rename"},
-            {"the menu of the bar", [this] { program->press("Order and Options"); }, "Name"}};
+            {"the menu of the bar",
+                [this] {
+                    program->pressUntil("Order and Options", [this] { return program->shows("Name"); });
+                },
+                "Name"}};
     }
     void openDesktop()
     {
-        program->press("Desktop");
-        EXPECT_TRUE(eventually([this] { return program->shows("To do.txt"); }));
+        program->pressUntil("Desktop", [this] { return program->shows("To do.txt"); });
+        EXPECT_TRUE(program->shows("To do.txt"));
     }
     int open(const std::string& path) const
     {
