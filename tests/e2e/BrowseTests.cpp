@@ -60,5 +60,17 @@ TEST_F(BrowseTests, AnItemGoesToANewFolderThroughThePicker)
     EXPECT_TRUE(program->shows("Packing list.md"));
 }
 
+TEST_F(BrowseTests, AWindowSaysWhatNeedsNoAnswer)
+{
+    start();
+    program->pressUntil("Desktop", [this] { return program->shows("System pictures"); });
+    program->press("System pictures");
+    EXPECT_TRUE(eventually(
+        [this] { return program->says("“System pictures” leads to a place outside the drive."); }));
+    std::filesystem::rename(top / "Desktop", top / "Elsewhere");
+    EXPECT_TRUE(eventually([this] { return program->says("“Desktop” is no longer there."); }));
+    EXPECT_TRUE(eventually([this] { return program->shows("Elsewhere"); }));
+}
+
 } // namespace
 } // namespace e2e
