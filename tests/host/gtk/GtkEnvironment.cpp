@@ -55,6 +55,8 @@ public:
         setenv("XDG_CACHE_HOME", _home.at("cache").c_str(), 1);
         setenv("GDK_BACKEND", "x11", 1);
         setenv("GSK_RENDERER", "cairo", 1);
+        // The drivers of OpenGL leak a little, and are unloaded before the sanitizer can tell whose it was.
+        setenv("GDK_DEBUG", "gl-disable", 1);
         setenv("GSETTINGS_BACKEND", "memory", 1);
         setenv("GTK_A11Y", "none", 1);
         unsetenv("WAYLAND_DISPLAY");
