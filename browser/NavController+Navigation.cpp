@@ -20,6 +20,7 @@
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
 #include "screens/DisplayName.h"
+#include "screens/EndPresented.h"
 #include "screens/list/DocumentListController.h"
 
 #include <array>
@@ -49,7 +50,7 @@ std::string described(const std::shared_ptr<DRItem>& item)
     return item ? item->description() : "(null)";
 }
 
-/// Where a symbolic link leads.
+/// Says where a symbolic link leads.
 struct LinkTarget {
     enum class Place { InDrive, OutsideDrive, Nowhere };
     Place place = Place::InDrive;
@@ -161,8 +162,7 @@ bool NavController::isSearchPresented() const
 
 void NavController::endEverythingPresented()
 {
-    if (presentedViewController())
-        dismissViewController(false);
+    screens::endPresented(*this);
 }
 
 void NavController::tell(const std::string& notice) const
@@ -316,7 +316,7 @@ void NavController::documentListControllerItemsChanged(const List& list)
 
 void NavController::documentListControllerURLWasRemoved(const List& list)
 {
-    // What lies over the list asks about items that went with the folder.
+    // The screens over the list ask about items that went with the folder.
     endEverythingPresented();
     if (viewControllers().size() > 1)
         tell(platform::localized("“%@” is no longer there.", {list->title()}));

@@ -16,6 +16,7 @@
 #include "preview/PreviewDetailsViewController.h"
 #include "preview/PreviewItemManager.h"
 #include "screens/DisplayName.h"
+#include "screens/EndPresented.h"
 #include "screens/FolderPlaces.h"
 
 namespace tarrow {
@@ -214,9 +215,8 @@ void PreviewItemManager::popPreview(const std::string& notice)
     const auto navigation = navigationController();
     if (!navigation || !isPreviewControllerDisplayed(navigation->topViewController()))
         return;
-    // What lies over the preview asks about the item that has gone.
-    if (navigation->presentedViewController())
-        navigation->dismissViewController(false);
+    // The screens over the preview ask about the item that has gone.
+    screens::endPresented(*navigation);
     navigation->popViewController(true);
     if (const auto window = navigation->window())
         window->showNotice(notice);

@@ -17,6 +17,7 @@
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewDetailsViewController.h"
 #include "screens/DocumentInteractionSheet.h"
+#include "screens/EndPresented.h"
 
 #include <thread>
 #include <utility>
@@ -276,7 +277,7 @@ bool PreviewItemManager::warpToNewURL(const Url& url)
             stack.push_back(screen);
     }
     if (const auto navigation = navigationController()) {
-        navigation->dismissViewController(false);
+        screens::endPresented(*navigation);
         navigation->setViewControllers(std::move(stack), true);
     }
     setItemUpdatePreview(item, false);

@@ -156,6 +156,23 @@ TEST_F(InterruptionTest, AnAnswerThatComesBeforeTheNewsOfASignOutChangesNothing)
     }
 }
 
+TEST_F(InterruptionTest, AQuestionAboutChangesThatWouldBeLostStaysUntilItIsAnswered)
+{
+    for (const auto& interruption : interruptions()) {
+        SCOPED_TRACE(interruption.name);
+        std::filesystem::remove_all(url("Elsewhere").path());
+        cloud->token = platform::PropertyValue("account-1");
+        openFolder();
+        const auto question = std::make_shared<kit::AlertController>("Unsaved", "", kit::AlertStyle::Alert);
+        for (const char* answer : {"Keep a Copy", "Discard Changes"})
+            question->addAction(std::make_shared<kit::AlertAction>(answer, kit::AlertActionStyle::Default));
+        browser->presentViewController(question, false);
+        interruption.happen();
+        settle();
+        EXPECT_EQ(alert(), question);
+    }
+}
+
 TEST_F(InterruptionTest, APeekEndsWithItsItem)
 {
     openFolder();
