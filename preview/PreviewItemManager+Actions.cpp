@@ -9,7 +9,6 @@
 #include "platform/Dispatch.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
-#include "platform/Weakly.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
 
@@ -18,11 +17,12 @@ namespace tarrow {
 using platform::Operation;
 using platform::services;
 using platform::Url;
-using platform::weakly;
 using screens::MoveTargetPicker;
 using screens::MoveTargetScope;
 
 namespace {
+
+using Screen = PreviewItemManager::Screen;
 
 /// Changes files on a queue of its own, because another program may hold an item and the disk may be slow.
 void changeFiles(platform::Work work)
@@ -46,14 +46,29 @@ std::vector<Error> moveAll(const std::vector<Move>& moves)
     return errors;
 }
 
-} // namespace
+/// Finds where an error is shown. A change may end after the preview was left and its manager is gone, so
+/// this holds the stack and not the manager.
+class ErrorPlace {
+public:
+    ErrorPlace(const std::shared_ptr<kit::NavigationController>& navigation, const Screen& asking)
+        : _navigation(navigation)
+        , _asking(asking)
+    {
+    }
+    /// Answers the screen that asked while it is visible, else the top screen of the stack.
+    Screen screen() const
+    {
+        const auto asking = _asking.lock();
+        const auto navigation = _navigation.lock();
+        return (asking && asking->isVisible()) || !navigation ? asking : navigation->topViewController();
+    }
 
-/// Answers a visible screen for an alert, because the screen that asked may be gone when a change has ended.
-PreviewItemManager::Screen PreviewItemManager::screenForAlerts(const Screen& wanted) const
-{
-    const auto navigation = navigationController();
-    return (wanted && wanted->isVisible()) || !navigation ? wanted : navigation->topViewController();
-}
+private:
+    std::weak_ptr<kit::NavigationController> _navigation;
+    std::weak_ptr<kit::ViewController> _asking;
+};
+
+} // namespace
 
 void PreviewItemManager::showWarningAndDeleteDocumentBarButton(
     const Screen& screen, const std::shared_ptr<kit::BarButtonItem>& button)
@@ -74,14 +89,13 @@ void PreviewItemManager::removeItem(const Screen& screen)
     const auto url = itemURL();
     if (!url)
         return;
-    changeFiles([weak = weak_from_this(), screen = std::weak_ptr(screen), url = *url,
+    changeFiles([place = ErrorPlace(navigationController(), screen), url = *url,
                     main = services().dispatch().mainQueue()] {
         const auto error = FileUtils::remove(url);
         if (!error)
             return;
-        main->async(weakly(weak, [screen, error = *error](PreviewItemManager& self) {
-            UIUtils::showErrorParentViewController(error, self.screenForAlerts(screen.lock()));
-        }));
+        main->async(
+            [place, error = *error] { UIUtils::showErrorParentViewController(error, place.screen()); });
     });
 }
 
@@ -115,20 +129,16 @@ void PreviewItemManager::documentTargetSelectionControllerDidSelectItemAtURL(
     std::vector<Move> moves;
     for (const auto& item : picker->itemsToMove())
         moves.push_back({item, folder.appendingPathComponent(item.lastPathComponent())});
-    changeFiles(
-        [weak = weak_from_this(), moves = std::move(moves), main = services().dispatch().mainQueue()] {
-            auto errors = moveAll(moves);
-            if (errors.empty())
-                return;
-            main->async(weakly(weak, [errors = std::move(errors)](PreviewItemManager& self) {
-                const auto navigation = self.navigationController();
-                for (const auto& error : errors) {
-                    if (navigation)
-                        UIUtils::showFriendlyMoveErrorParentViewController(
-                            error, navigation->topViewController());
-                }
-            }));
+    changeFiles([place = ErrorPlace(navigationController(), nullptr), moves = std::move(moves),
+                    main = services().dispatch().mainQueue()] {
+        auto errors = moveAll(moves);
+        if (errors.empty())
+            return;
+        main->async([place, errors = std::move(errors)] {
+            for (const auto& error : errors)
+                UIUtils::showFriendlyMoveErrorParentViewController(error, place.screen());
         });
+    });
 }
 
 } // namespace tarrow

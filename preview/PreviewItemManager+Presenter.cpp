@@ -150,7 +150,7 @@ void PreviewItemManager::refreshScreens(
     const DRItem& item, bool isElsewhere, bool isNewer, bool wasDownloaded)
 {
     const auto preview = LookwellItemController::defaultController();
-    preview->setTitle(item.localizedName());
+    preview->setTitle(screens::displayName(item.localizedName()));
     if (preview->isVisible() && isNewer)
         reloadPreview();
     if (_detailsViewController && (isElsewhere || isNewer || (!wasDownloaded && item.isDownloaded())))

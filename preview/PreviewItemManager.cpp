@@ -3,7 +3,6 @@
 
 // This file chooses the screen of an item and puts it on the stack. The presenter, the actions and the
 // hand-over have sources of their own.
-// have sources of their own.
 
 #include "preview/PreviewItemManager.h"
 

@@ -145,7 +145,6 @@ private:
     void clearRefreshPending();
     void refreshScreens(const DRItem& item, bool isElsewhere, bool isNewer, bool wasDownloaded);
     void removeItem(const Screen& screen);
-    Screen screenForAlerts(const Screen& wanted) const;
 
     int _mode = PreviewModeQuick;
     std::shared_ptr<platform::OperationQueue> _fcQueue;

@@ -21,6 +21,9 @@ std::shared_ptr<MoveTargetPicker> MoveTargetPicker::initWithItemsScope(
         : std::optional(picker->_itemsToMove.front().deletingLastPathComponent());
     if (start)
         picker->show(*start);
+    // The items' container may have gone. Without a screen the picker would have no Cancel button.
+    if (picker->viewControllers().empty() && rootFolder())
+        picker->show(*rootFolder());
     return picker;
 }
 
@@ -93,10 +96,13 @@ void MoveTargetPicker::choose(const Url& folder)
 {
     if (_hasEnded || !canChoose(folder))
         return;
+    const auto told = _delegate.lock();
+    // Only the delegate moves the items and dismisses the picker. It goes with what it wanted to move.
+    if (!told)
+        return cancel();
     _hasEnded = true;
     RecentMoveTargets::remember(folder);
-    if (const auto told = _delegate.lock())
-        told->documentTargetSelectionControllerDidSelectItemAtURL(self(), folder);
+    told->documentTargetSelectionControllerDidSelectItemAtURL(self(), folder);
 }
 
 void MoveTargetPicker::cancel()

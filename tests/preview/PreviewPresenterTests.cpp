@@ -96,6 +96,15 @@ TEST_F(Presenter, ReloadsOnlyNewerContentThatSomebodySees)
     EXPECT_EQ(refreshes(), 1);
 }
 
+TEST_F(Presenter, ShowsTheNameInSafeCharactersAfterARefreshToo)
+{
+    const auto url = open("Bill\n\u202Efdp.exe");
+    const auto before = preview->title();
+    EXPECT_THAT(before, testing::Not(HasSubstr("\n")));
+    manager->refreshItem(url);
+    EXPECT_EQ(preview->title(), before);
+}
+
 TEST_F(Presenter, BringsTheDetailsUpToDate)
 {
     const auto url = open("Notes.txt", PreviewModeDetails);
@@ -271,19 +280,34 @@ TEST_F(Presenter, DeletesWhenTheUserConfirms)
             {"Pressed Delete (LW)", "Delete was Cancelled (itemMgr)", "Delete was Confirmed (itemMgr)"}));
 }
 
-TEST_F(Presenter, SaysWhyADocumentCouldNotBeDeleted)
+TEST_F(Presenter, SaysWhyADocumentCouldNotBeDeletedOrMovedAlsoWhenThePreviewWasLeft)
 {
-    const auto url = open("Notes.txt");
-    manager->showWarningAndDeleteDocumentBarButton(navigation->topViewController(), nullptr);
-    ASSERT_TRUE(alert());
-    const auto question = alert();
-    manager->unregisterAsFilePresenter();
-    std::filesystem::remove(url.path());
-    EXPECT_TRUE(question->press(0));
-    drive.settle();
-    ASSERT_TRUE(alert());
-    EXPECT_EQ(alert()->actions().size(), 1U);
-    EXPECT_FALSE(alert()->title().empty());
+    const auto folder = drive.makeFolder("Documents/Trip");
+    for (const bool isMoved : {false, true}) {
+        for (const bool isLeft : {false, true}) {
+            manager = PreviewItemManager::newItemManagerWithModeNavController(PreviewModeQuick, navigation);
+            const auto url = open("Notes.txt");
+            const auto& buttons = preview->additionalRightBarButtonItems();
+            (isMoved ? buttons.back() : buttons.front())->press();
+            manager->unregisterAsFilePresenter();
+            std::filesystem::remove(url.path());
+            if (isMoved)
+                std::dynamic_pointer_cast<MoveTargetPicker>(navigation->presentedViewController())
+                    ->choose(folder);
+            else
+                alert()->press(0);
+            // The browser lets go of the manager as soon as the list is shown.
+            if (isLeft) {
+                navigation->popViewController(false);
+                manager = nullptr;
+            }
+            drive.settle();
+            ASSERT_TRUE(alert()) << isMoved << isLeft;
+            EXPECT_EQ(alert()->actions().size(), 1U);
+            EXPECT_FALSE(alert()->title().empty());
+            EXPECT_TRUE(alert()->press(0));
+        }
+    }
 }
 
 TEST_F(Presenter, MovesToTheChosenFolder)

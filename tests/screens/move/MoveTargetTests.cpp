@@ -3,6 +3,7 @@
 
 #include "tests/screens/support/ScreensFixture.h"
 
+#include "kit/controllers/NavigationItem.h"
 #include "kit/views/TextField.h"
 #include "platform/FileSystem.h"
 #include "screens/PlaceholderView.h"
@@ -121,6 +122,20 @@ TEST_F(MoveTarget, OffersTheLastDestinationsThatAreStillThere)
     screen->listView()->activateRow(1);
     EXPECT_EQ(folderOf(*third), "2025");
     EXPECT_TRUE(load(*third)->toolbarItems().back()->isEnabled());
+}
+
+TEST_F(MoveTarget, CanBeLeftWhenWhatWasToBeMovedIsGone)
+{
+    const auto folder = drive.makeFolder("Archive");
+    const auto picker = pick({drive.writeDocument("Notes.txt")});
+    told = nullptr;
+    picker->choose(folder);
+    EXPECT_FALSE(base->presentedViewController());
+
+    const auto outside = pick({Url::fileURL(drive.folder().at("gone library/Sketch.txt"))});
+    ASSERT_THAT(outside->viewControllers(), SizeIs(1));
+    outside->topViewController()->navigationItem().rightItems().front()->press();
+    EXPECT_FALSE(base->presentedViewController());
 }
 
 TEST_F(MoveTarget, MakesAFolderAndEntersItOrSaysWhyNot)
