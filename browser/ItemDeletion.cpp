@@ -24,10 +24,11 @@ void failed(DeletionOutcome& outcome, std::optional<Error> error)
         outcome.lastError = std::move(error);
 }
 
-void deleteItem(const Url& url, DeletionOutcome& outcome)
+void deleteItem(const Url& url, const ItemChange& change, DeletionOutcome& outcome)
 {
     op.info("Deleting item %@", url);
-    if (auto error = FileUtils::remove(url)) {
+    auto error = FileUtils::remove(url, change.stillWanted());
+    if (error && !change.wasTakenBack(*error)) {
         op.warning("Failed to delete URL %@: %{public}@", url, *error);
         failed(outcome, std::move(error));
     }
@@ -54,15 +55,16 @@ void deleteLibrary(const Url& url, DeletionOutcome& outcome)
 
 } // namespace
 
-DeletionOutcome deleteItems(const std::vector<Url>& urls)
+DeletionOutcome deleteItems(ItemChange& change)
 {
     DeletionOutcome outcome;
-    for (const auto& url : urls) {
-        if (containers().isContainerTopFolder(url))
-            deleteLibrary(url, outcome);
+    change.forEachItem([&](const Url& item) {
+        if (containers().isContainerTopFolder(item))
+            deleteLibrary(item, outcome);
         else
-            deleteItem(url, outcome);
-    }
+            deleteItem(item, change, outcome);
+        return std::nullopt;
+    });
     return outcome;
 }
 

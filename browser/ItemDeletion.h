@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "items/PlatformNames.h"
+#include "items/ItemChange.h"
 
 #include <cstddef>
 #include <optional>
@@ -17,8 +17,9 @@ struct DeletionOutcome {
     std::optional<Error> lastError; ///< absent when no failure answered an error
 };
 
-/// Deletes items and app libraries one after the other; a failure does not end it. A library is deleted with
-/// everything in it. The drive's own container is never deleted. Blocks; main thread.
-DeletionOutcome deleteItems(const std::vector<Url>& urls);
+/// Deletes the items and app libraries of a change one after the other; a failure does not end it. A library
+/// is deleted with everything in it. The drive's own container is never deleted. What was taken back is no
+/// failure. Blocks, so it runs on the change's queue.
+DeletionOutcome deleteItems(ItemChange& change);
 
 } // namespace tarrow

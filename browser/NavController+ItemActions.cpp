@@ -7,12 +7,14 @@
 #include "browser/NavController.h"
 #include "items/DRItem.h"
 #include "items/FileUtils.h"
+#include "items/ItemChange.h"
 #include "items/MenuEnableChecks.h"
 #include "items/UrlResolution.h"
 #include "kit/controllers/AlertController.h"
 #include "kit/views/View.h"
 #include "platform/Localization.h"
 #include "platform/Log.h"
+#include "platform/Weakly.h"
 #include "preview/PreviewMode.h"
 #include "prompts/NewFolderPrompt.h"
 #include "prompts/RenamePrompt.h"
@@ -23,6 +25,7 @@ namespace tarrow {
 
 using platform::localized;
 using platform::localizedPlural;
+using platform::weakly;
 using screens::DocumentListAction;
 using screens::MoveTargetPicker;
 using screens::MoveTargetScope;
@@ -40,21 +43,43 @@ void call(const NavController::Completion& completion)
         completion();
 }
 
-/// Creates a folder if it does not exist yet.
-std::optional<Error> makeFolder(const Url& folder, const Operation& op)
+/// What became of a new folder and of the items that were to move into it.
+struct FolderOutcome {
+    std::optional<Error> refused; ///< the folder was not made
+    std::vector<Error> left; ///< items could not be moved
+};
+
+/// Creates a folder if it does not exist yet, and moves the items of a change into it.
+FolderOutcome makeFolder(const Url& folder, ItemChange& change, const Operation& op)
 {
     if (FileUtils::exists(folder)) {
         op.info("Item exists at path: %@", folder);
-        return Error(FileErrorCode::ItemExists);
+        return {Error(FileErrorCode::ItemExists), {}};
     }
-    return FileUtils::mkdir(folder);
+    if (auto refused = FileUtils::mkdir(folder, change.stillWanted()))
+        return {std::move(refused), {}};
+    return {std::nullopt, moveItems(change, folder)};
 }
 
-/// Answers the prompt's message about items that could not be moved into the new folder.
+/// Answers a prompt's message about an error. What was taken back needs no words.
+std::string messageAbout(const std::optional<Error>& error)
+{
+    return error && error->is(FileErrorCode::Cancelled) ? std::string() : UIUtils::bestMessage(error);
+}
+
+/// Answers the prompt's message about items that could not be moved into the new folder; empty without any.
 std::string messageAbout(const std::vector<Error>& errors)
 {
+    if (errors.empty())
+        return {};
     return errors.size() == 1 ? UIUtils::bestMessage(errors.front())
                               : localizedPlural(".DICT.CANNOT_MOVE_ITEMS.%d", {count(errors)});
+}
+
+/// Answers whether a person still looks at a prompt that waits. It may have gone with the screen under it.
+bool isOnScreen(const FilenamePrompt& prompt)
+{
+    return prompt.isWaiting() && prompt.alert()->presentingViewController();
 }
 
 } // namespace
@@ -150,23 +175,35 @@ void NavController::showNewFolderPromptDuringMoveItemsToMove(
     const auto title =
         items.empty() ? localized("New Folder") : localizedPlural(".DICT.MOVE_ITEMS.%d", {count(items)});
     const auto confirmed = [weak = std::weak_ptr(self()), folder = *folder, items, asked = AccountSession()](
-                               const std::string& name, bool& accepted) -> std::string {
+                               const std::string& name, bool&) -> std::string {
         if (name.empty() || !asked.isCurrent())
             return {};
         op.userAction("New Folder name entry Confirmed");
         op.info("New folder entered: %@", name);
-        const auto made = folder.appendingPathComponent(name, platform::PathKind::Directory);
-        if (const auto error = makeFolder(made, op))
-            return UIUtils::bestMessage(error);
-        const auto browser = weak.lock();
-        const auto errors = browser && !items.empty() ? browser->moveItemsToDirectoryToDirectory(items, made)
-                                                      : std::vector<Error>();
-        accepted = errors.empty();
-        return accepted ? std::string() : messageAbout(errors);
+        if (const auto browser = weak.lock())
+            browser->makeFolderForItems(
+                folder.appendingPathComponent(name, platform::PathKind::Directory), items, asked);
+        return {};
     };
     _folderPromptAlert = NewFolderPrompt::newWithTitleDoneButtonTextCompletion(
         title, items.empty() ? localized("Create") : localized("Move"), confirmed);
     presentViewController(_folderPromptAlert->alert(), true);
+}
+
+void NavController::makeFolderForItems(
+    const Url& folder, const std::vector<Url>& items, const AccountSession& asked)
+{
+    static constexpr Operation op{"-[NavController showNewFolderPromptDuringMove:itemsToMove:]"};
+    const auto change = ItemChange::begin(
+        asked, items, [folder](ItemChange& begun) { return makeFolder(folder, begun, op); },
+        weakly(this, [prompt = _folderPromptAlert](NavController& self, const FolderOutcome& outcome) {
+            const auto message = outcome.refused ? messageAbout(outcome.refused) : messageAbout(outcome.left);
+            if (isOnScreen(*prompt))
+                prompt->answer(!outcome.refused && outcome.left.empty(), message);
+            else if (prompt->isWaiting() && !message.empty())
+                UIUtils::showAlertMessageParentViewController(message, {}, self.topViewController());
+        }));
+    _folderPromptAlert->waitForAnswer([change] { change->cancel(); });
 }
 
 void NavController::showMoveTargetForSelectedItems(const Sender&)
@@ -216,29 +253,41 @@ void NavController::documentTargetSelectionControllerDidSelectItemAtURL(
         moveItemsToDirectoryAndShowErrorsToDirectory(picker->itemsToMove(), folder);
 }
 
-std::vector<Error> NavController::moveItemsToDirectoryToDirectory(
-    const std::vector<Url>& items, const Url& directory)
+namespace {
+
+std::vector<Error> moveAll(ItemChange& change, const Url& directory)
 {
     static constexpr Operation op{"-[NavController moveItemsToDirectory:toDirectory:]"};
     op.debug("MoveTarget = %@", directory);
-    op.debug("ItemsToMove = %@", items);
-    std::vector<Error> errors;
-    for (const auto& item : items) {
-        if (auto error = FileUtils::moveTo(item, directory.appendingPathComponent(item.lastPathComponent())))
-            errors.push_back(std::move(*error));
-    }
-    return errors;
+    op.debug("ItemsToMove = %@", change.items());
+    return moveItems(change, directory);
+}
+
+} // namespace
+
+std::vector<Error> NavController::moveItemsToDirectoryToDirectory(
+    const std::vector<Url>& items, const Url& directory)
+{
+    ItemChange change(AccountSession(), items);
+    return moveAll(change, directory);
 }
 
 void NavController::moveItemsToDirectoryAndShowErrorsToDirectory(
     const std::vector<Url>& items, const Url& directory)
 {
-    const auto errors = moveItemsToDirectoryToDirectory(items, directory);
-    if (errors.size() == 1)
-        UIUtils::showFriendlyMoveErrorParentViewController(errors.front(), topViewController());
-    else if (!errors.empty())
-        UIUtils::showAlertMessageParentViewController(
-            localizedPlural(".DICT.CANNOT_MOVE_ITEMS.%d", {count(errors)}), {}, topViewController());
+    const AccountSession asked;
+    ItemChange::begin(
+        asked, items, [directory](ItemChange& change) { return moveAll(change, directory); },
+        weakly(this, [asked](NavController& self, const std::vector<Error>& errors) {
+            if (!asked.isCurrent())
+                return;
+            const auto top = self.topViewController();
+            if (errors.size() == 1)
+                UIUtils::showFriendlyMoveErrorParentViewController(errors.front(), top);
+            else if (!errors.empty())
+                UIUtils::showAlertMessageParentViewController(
+                    localizedPlural(".DICT.CANNOT_MOVE_ITEMS.%d", {count(errors)}), {}, top);
+        }));
 }
 
 void NavController::showRenamePrompt(const Url& url)
@@ -253,15 +302,30 @@ void NavController::showRenamePrompt(const Url& url)
         return;
     }
     _folderPromptAlert = RenamePrompt::newWithFilenameCompletion(item->localizedName(),
-        [url, asked = AccountSession()](const std::string& name, bool& accepted) -> std::string {
+        [weak = std::weak_ptr(self()), url, asked = AccountSession()](
+            const std::string& name, bool&) -> std::string {
             if (name.empty() || !asked.isCurrent())
                 return {};
             op.userAction("Rename entry confirmed (nav)");
-            const auto error = UIUtils::renameItemAtURLToName(url, name);
-            accepted = !error;
-            return UIUtils::bestMessage(error);
+            if (const auto browser = weak.lock())
+                browser->renameConfirmed(url, name, asked);
+            return {};
         });
     visibleViewController()->presentViewController(_folderPromptAlert->alert(), true);
+}
+
+void NavController::renameConfirmed(const Url& url, const std::string& name, const AccountSession& asked)
+{
+    const auto renamed = [prompt = _folderPromptAlert, name](
+                             NavController& self, const std::optional<Error>& error) {
+        if (isOnScreen(*prompt))
+            prompt->answer(!error, messageAbout(error));
+        else if (prompt->isWaiting() && error && !error->is(FileErrorCode::Cancelled))
+            UIUtils::showFriendlyRenameErrorBasenameParentViewController(
+                *error, name, self.topViewController());
+    };
+    const auto change = UIUtils::renameItemAtURLToNameCompletion(url, name, weakly(this, renamed), asked);
+    _folderPromptAlert->waitForAnswer([change] { change->cancel(); });
 }
 
 void NavController::showWarningAndDeleteDocument(const Sender&)
@@ -301,20 +365,31 @@ void NavController::showWarningAndDeleteURLsUsingViewWithDocumentListControllerF
             const bool isConfirmed = !cancelled && asked.isCurrent();
             if (isConfirmed && list)
                 browser->setEditModeAndUpdateUIForViewController(false, list);
-            browser->deleteConfirmed(isConfirmed ? urls : std::vector<Url>(), finished);
+            if (isConfirmed)
+                browser->deleteConfirmed(urls, finished, asked);
+            else
+                call(finished);
         });
 }
 
-void NavController::deleteConfirmed(const std::vector<Url>& urls, const Completion& finished)
+void NavController::deleteConfirmed(
+    const std::vector<Url>& urls, const Completion& finished, const AccountSession& asked)
 {
-    const auto outcome = deleteItems(urls);
-    call(finished);
-    if (outcome.failures == 1)
-        UIUtils::showErrorParentViewController(outcome.lastError, topViewController());
-    else if (outcome.failures > 1)
-        UIUtils::showAlertMessageParentViewController(
-            localizedPlural(".DICT.CANNOT_DELETE_ITEMS.%d", {static_cast<std::int64_t>(outcome.failures)}),
-            {}, topViewController());
+    const auto showFailures = [asked](NavController& self, const DeletionOutcome& outcome) {
+        if (!asked.isCurrent())
+            return;
+        const auto failures = static_cast<std::int64_t>(outcome.failures);
+        if (failures == 1)
+            UIUtils::showErrorParentViewController(outcome.lastError, self.topViewController());
+        else if (failures > 1)
+            UIUtils::showAlertMessageParentViewController(
+                localizedPlural(".DICT.CANNOT_DELETE_ITEMS.%d", {failures}), {}, self.topViewController());
+    };
+    ItemChange::begin(asked, urls, deleteItems,
+        [finished, show = weakly(this, showFailures)](const DeletionOutcome& outcome) {
+            call(finished);
+            show(outcome);
+        });
 }
 
 void NavController::showDICUrlCompletion(

@@ -169,7 +169,7 @@ public:
     std::vector<platform::Color> documentListControllerColorsForTagNames(
         const List& list, const std::vector<std::string>& names) override;
 
-    // These act on items. The file operations block until they are done.
+    // These act on items. Every change runs on the queue that all changes share, see ItemChange.
     /// Asks for the name of a new folder in the folder of the list on top.
     void promtForNewFolderAndCreate(const Sender& sender);
     /// Asks for the name of a new folder, creates it and moves items into it.
@@ -189,10 +189,11 @@ public:
     /// Asks for an item's new name.
     void showRenamePrompt(const platform::Url& url);
     /// Moves items into a folder one after the other, and answers the errors of those that could not be
-    /// moved.
+    /// moved. This one blocks until they are moved.
     std::vector<platform::Error> moveItemsToDirectoryToDirectory(
         const std::vector<platform::Url>& items, const platform::Url& directory);
-    /// Moves items into a folder like the operation above, and shows the user which could not be moved.
+    /// Begins to move items into a folder like the operation above, and shows the user in the end which could
+    /// not be moved.
     void moveItemsToDirectoryAndShowErrorsToDirectory(
         const std::vector<platform::Url>& items, const platform::Url& directory);
     /// Asks before the selected items of the list on top are deleted.
@@ -224,7 +225,11 @@ private:
     void performDelete(
         const platform::Url& url, const std::shared_ptr<kit::View>& view, const Completion& completion);
     void performInfo(const platform::Url& url);
-    void deleteConfirmed(const std::vector<platform::Url>& urls, const Completion& finished);
+    void makeFolderForItems(
+        const platform::Url& folder, const std::vector<platform::Url>& items, const AccountSession& asked);
+    void renameConfirmed(const platform::Url& url, const std::string& name, const AccountSession& asked);
+    void deleteConfirmed(
+        const std::vector<platform::Url>& urls, const Completion& finished, const AccountSession& asked);
 
     Sender makeToolbarButton(const std::string& title, void (NavController::*operation)(const Sender&));
     void configureEditToolbar(const List& list);

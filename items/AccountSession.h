@@ -10,7 +10,7 @@
 namespace tarrow {
 
 /// Remembers who was signed in when a person was asked something. The answer may come after a sign-out, and
-/// must then change nothing, because it was meant for a drive that the person no longer has. Main thread.
+/// must then change nothing, because it was meant for a drive that the person no longer has. Any thread.
 class AccountSession {
 public:
     /// Begins with the account of now.

@@ -35,6 +35,12 @@ struct KnownState {
     std::optional<platform::ItemVersion> version;
 };
 
+/// Answers the error of a change that nobody wants any more, or nothing.
+std::optional<Error> refuseUnwanted(const FileUtils::StillWanted& stillWanted)
+{
+    return stillWanted && !stillWanted() ? std::optional(Error(FileErrorCode::Cancelled)) : std::nullopt;
+}
+
 /// Deletes the item in a coordinated write, if it is unchanged.
 std::optional<Error> removeUnchanged(const Url& location, const KnownState& before)
 {
@@ -88,13 +94,15 @@ std::optional<Error> refuseKinds(const Url& source, const Url& destination)
 
 } // namespace
 
-std::optional<Error> FileUtils::mkdir(const Url& url)
+std::optional<Error> FileUtils::mkdir(const Url& url, const StillWanted& stillWanted)
 {
     static constexpr Operation op{"+[FileUtils mkdir:]"};
     op.debug("Creating directory: '%@'", url);
     std::optional<Error> failed;
     const auto refused = coordinator().coordinateWriting(url, WritingOptions::None, [&](const Url& location) {
-        failed = changes().createFolder(location.path());
+        failed = refuseUnwanted(stillWanted);
+        if (!failed)
+            failed = changes().createFolder(location.path());
         if (failed)
             op.error("failed to create directory:'%@': %@", location, *failed);
         else
@@ -105,7 +113,7 @@ std::optional<Error> FileUtils::mkdir(const Url& url)
     return result;
 }
 
-std::optional<Error> FileUtils::remove(const Url& url)
+std::optional<Error> FileUtils::remove(const Url& url, const StillWanted& stillWanted)
 {
     static constexpr Operation op{"+[FileUtils remove:]"};
     op.debug("Removing item: '%@'", url);
@@ -113,14 +121,19 @@ std::optional<Error> FileUtils::remove(const Url& url)
     const auto version = changes().versionOfItem(url.path());
     const KnownState before{modificationDate(url), version};
     std::optional<Error> failed;
-    const auto refused = coordinator().coordinateWriting(url, WritingOptions::ForDeleting,
-        [&](const Url& location) { failed = removeUnchanged(location, before); });
+    const auto refused =
+        coordinator().coordinateWriting(url, WritingOptions::ForDeleting, [&](const Url& location) {
+            failed = refuseUnwanted(stillWanted);
+            if (!failed)
+                failed = removeUnchanged(location, before);
+        });
     auto result = refused ? refused : failed;
     op.info("Coordinated Write returned %@", result);
     return result;
 }
 
-std::optional<Error> FileUtils::moveTo(const Url& source, const Url& destination)
+std::optional<Error> FileUtils::moveTo(
+    const Url& source, const Url& destination, const StillWanted& stillWanted)
 {
     static constexpr Operation op{"+[FileUtils move:to:]"};
     op.debug("Moving src1:  '%@'", source);
@@ -133,8 +146,11 @@ std::optional<Error> FileUtils::moveTo(const Url& source, const Url& destination
         return refused;
     std::optional<Error> failed;
     const auto refused = coordinator().coordinateWriting(source, WritingOptions::ForMoving, destination,
-        WritingOptions::ForReplacing,
-        [&](const Url& from, const Url& to) { failed = moveAnnounced(from, to); });
+        WritingOptions::ForReplacing, [&](const Url& from, const Url& to) {
+            failed = refuseUnwanted(stillWanted);
+            if (!failed)
+                failed = moveAnnounced(from, to);
+        });
     auto result = refused ? refused : failed;
     if (result)
         op.warning("Move failed: %@", *result);

@@ -5,6 +5,7 @@
 
 #include "items/PlatformNames.h"
 
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
@@ -62,15 +63,20 @@ public:
     /// without the item's own name. Answers nothing when the location cannot be split.
     static std::optional<std::string> displayableLocationForURL(const Url& url);
 
+    /// Asked once it is the change's turn, on the same thread, right before the disk is changed. When it
+    /// answers false, nothing is changed and FileErrorCode::Cancelled is answered. Empty: always wanted.
+    using StillWanted = std::function<bool()>;
+
     /// Creates a folder and the missing folders above it.
-    static std::optional<Error> mkdir(const Url& url);
+    static std::optional<Error> mkdir(const Url& url, const StillWanted& stillWanted = {});
     /// Deletes an item for good. If the item changed after this was called, it is kept and
     /// FileErrorCode::Cancelled is answered.
-    static std::optional<Error> remove(const Url& url);
+    static std::optional<Error> remove(const Url& url, const StillWanted& stillWanted = {});
     /// Moves an item to a new location whose last part is the item's new name, so this renames as well.
     /// Moving an item to its own location does nothing. Answers FileErrorCode::Unsupported when a folder is
     /// at a file's new location or a file at a folder's.
-    static std::optional<Error> moveTo(const Url& source, const Url& destination);
+    static std::optional<Error> moveTo(
+        const Url& source, const Url& destination, const StillWanted& stillWanted = {});
     /// Removes the downloaded copy of a cloud item. Answers whether no error was reported.
     static bool evictDocument(const Url& url);
 };

@@ -5,6 +5,7 @@
 
 #include "items/DRItem.h"
 #include "items/FileUtils.h"
+#include "items/ItemChange.h"
 #include "items/UrlResolution.h"
 #include "platform/Dispatch.h"
 #include "platform/Log.h"
@@ -23,28 +24,6 @@ using screens::MoveTargetScope;
 namespace {
 
 using Screen = PreviewItemManager::Screen;
-
-/// Changes files on a queue of its own, because another program may hold an item and the disk may be slow.
-void changeFiles(platform::Work work)
-{
-    const auto queue = services().dispatch().makeSerialQueue("TarrowDriveAppID.previewchanges");
-    // The work keeps its queue alive, so that the user's change happens even if the preview is closed.
-    queue->async([queue, work = std::move(work)] { work(); });
-}
-
-struct Move {
-    Url from, to;
-};
-
-std::vector<Error> moveAll(const std::vector<Move>& moves)
-{
-    std::vector<Error> errors;
-    for (const auto& move : moves) {
-        if (auto error = FileUtils::moveTo(move.from, move.to))
-            errors.push_back(std::move(*error));
-    }
-    return errors;
-}
 
 /// Finds where an error is shown. A change may end after the preview was left and its manager is gone, so
 /// this holds the stack and not the manager.
@@ -80,23 +59,25 @@ void PreviewItemManager::showWarningAndDeleteDocumentBarButton(
         [self = shared_from_this(), screen, asked = AccountSession()](const auto&, bool cancelled) {
             op.userAction(cancelled ? "Delete was Cancelled (itemMgr)" : "Delete was Confirmed (itemMgr)");
             if (!cancelled && asked.isCurrent())
-                self->removeItem(screen);
+                self->removeItem(screen, asked);
         });
 }
 
-void PreviewItemManager::removeItem(const Screen& screen)
+void PreviewItemManager::removeItem(const Screen& screen, const AccountSession& asked)
 {
     const auto url = itemURL();
     if (!url)
         return;
-    changeFiles([place = ErrorPlace(navigationController(), screen), url = *url,
-                    main = services().dispatch().mainQueue()] {
-        const auto error = FileUtils::remove(url);
-        if (!error)
-            return;
-        main->async(
-            [place, error = *error] { UIUtils::showErrorParentViewController(error, place.screen()); });
-    });
+    ItemChange::begin(
+        asked, {*url},
+        [](ItemChange& change) {
+            return change.forEachItem(
+                [&](const Url& item) { return FileUtils::remove(item, change.stillWanted()); });
+        },
+        [place = ErrorPlace(navigationController(), screen)](const std::vector<Error>& errors) {
+            for (const auto& error : errors)
+                UIUtils::showErrorParentViewController(error, place.screen());
+        });
 }
 
 void PreviewItemManager::showMoveTarget(const Screen& screen)
@@ -124,21 +105,15 @@ void PreviewItemManager::documentTargetSelectionControllerDidSelectItemAtURL(
     op.debug("MoveTarget = %@", folder);
     op.debug("ItemsToMove = %@", picker->itemsToMove());
     picker->dismissViewController(true);
-    if (!_moveAsked.value_or(AccountSession()).isCurrent())
+    const auto asked = _moveAsked.value_or(AccountSession());
+    if (!asked.isCurrent())
         return;
-    std::vector<Move> moves;
-    for (const auto& item : picker->itemsToMove())
-        moves.push_back({item, folder.appendingPathComponent(item.lastPathComponent())});
-    changeFiles([place = ErrorPlace(navigationController(), nullptr), moves = std::move(moves),
-                    main = services().dispatch().mainQueue()] {
-        auto errors = moveAll(moves);
-        if (errors.empty())
-            return;
-        main->async([place, errors = std::move(errors)] {
+    ItemChange::begin(
+        asked, picker->itemsToMove(), [folder](ItemChange& change) { return moveItems(change, folder); },
+        [place = ErrorPlace(navigationController(), nullptr)](const std::vector<Error>& errors) {
             for (const auto& error : errors)
                 UIUtils::showFriendlyMoveErrorParentViewController(error, place.screen());
         });
-    });
 }
 
 } // namespace tarrow

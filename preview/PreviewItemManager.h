@@ -144,7 +144,7 @@ private:
     void refreshAfterSubitemDeletion();
     void clearRefreshPending();
     void refreshScreens(const DRItem& item, bool isElsewhere, bool isNewer, bool wasDownloaded);
-    void removeItem(const Screen& screen);
+    void removeItem(const Screen& screen, const AccountSession& asked);
 
     int _mode = PreviewModeQuick;
     std::shared_ptr<platform::OperationQueue> _fcQueue;

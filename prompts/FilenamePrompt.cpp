@@ -13,6 +13,7 @@
 #include "prompts/UIUtils.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace tarrow {
 
@@ -117,6 +118,7 @@ void FilenamePrompt::addCancelAction(std::function<void()> handler)
             if (handler)
                 handler();
         });
+    cancel->setShouldClose(weaklyOr(true, this, &FilenamePrompt::withdraw));
     _alert->addAction(cancel);
     // The action's plain style does not mark it as the one that Escape presses.
     _alert->setEscapeAction(cancel);
@@ -137,25 +139,67 @@ void FilenamePrompt::folderPromptTextFieldChanged(const TextField* field)
         return;
     const auto name = trimmed(field->text());
     updateErrorMessage(complaintAbout(name));
-    _defaultAction->setEnabled(FileUtils::isValidFilename(name));
+    _defaultAction->setEnabled(FileUtils::isValidFilename(name) && !_isWaiting);
+}
+
+std::string FilenamePrompt::typedName() const
+{
+    return trimmed(_alert->textFields().front()->text());
 }
 
 bool FilenamePrompt::handleDoneAction()
 {
     // The return key may still arrive while the alert is closing.
-    if (_alert->textFields().empty() || _isAccepted)
+    if (_alert->textFields().empty() || _isAccepted || _isWaiting)
         return false;
-    const auto name = trimmed(_alert->textFields().front()->text());
+    const auto name = typedName();
     if (!FileUtils::isValidFilename(name))
         return false;
+    _confirmedName = name;
     // The callback may release the prompt.
     const auto keepsSelf = shared_from_this();
     bool accepted = false;
     const auto message = _validateNewFilenameCallback(name, accepted);
+    if (_isWaiting)
+        return false;
     if (!accepted)
         updateErrorMessage(message);
     _isAccepted = accepted;
     return accepted;
+}
+
+void FilenamePrompt::waitForAnswer(std::function<void()> withdraw)
+{
+    _isWaiting = true;
+    _withdraw = std::move(withdraw);
+    updateErrorMessage({});
+    _defaultAction->setEnabled(false);
+}
+
+bool FilenamePrompt::withdraw()
+{
+    if (std::exchange(_isWaiting, false) && _withdraw)
+        std::exchange(_withdraw, {})();
+    return true;
+}
+
+void FilenamePrompt::answer(bool accepted, const std::string& message)
+{
+    if (!std::exchange(_isWaiting, false))
+        return;
+    _withdraw = {};
+    _isAccepted = accepted;
+    const auto& field = _alert->textFields().front();
+    if (accepted) {
+        field->endEditing();
+        _alert->dismissViewController(true);
+        return;
+    }
+    // The button lost the keyboard when it was disabled.
+    field->becomeFirstResponder();
+    folderPromptTextFieldChanged(field.get());
+    if (typedName() == _confirmedName)
+        updateErrorMessage(message);
 }
 
 void FilenamePrompt::updateErrorMessage(const std::string& message)

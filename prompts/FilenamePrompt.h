@@ -20,7 +20,8 @@ namespace tarrow {
 class SimpleTextViewController;
 
 /// An alert in which the user types a name. It checks the name while it is typed, shows in red what is wrong
-/// with it, and stays open until the name is accepted or the user cancels.
+/// with it, and stays open until the name is accepted or the user cancels. The callback may answer later; the
+/// prompt waits for it without holding up anything.
 ///
 /// The caller presents the alert and keeps the prompt alive while it is shown, because the alert refers to
 /// the prompt only weakly. Without the prompt the alert closes only on Cancel. Main thread.
@@ -53,6 +54,15 @@ public:
         return _validateNewFilenameCallback;
     }
 
+    /// The callback calls this when its answer comes later; what it answers at once does not count then. The
+    /// prompt stays open, and confirming again does nothing. Cancel closes it at once and calls `withdraw`.
+    void waitForAnswer(std::function<void()> withdraw);
+    /// Answers whether the prompt waits. It does not any more once the user has cancelled.
+    bool isWaiting() const { return _isWaiting; }
+    /// The answer has come: closes the prompt, or shows a message unless the user has typed another name
+    /// since. Does nothing while the prompt does not wait.
+    void answer(bool accepted, const std::string& message);
+
     /// The user confirmed. Answers whether the alert may close.
     bool handleDoneAction();
     /// Shows a message in red. An empty one hides the area.
@@ -79,13 +89,17 @@ private:
     void addTextField(const Texts& texts);
     void addCancelAction(std::function<void()> handler);
     void addDefaultAction(const MaybeText& text);
+    std::string typedName() const;
+    bool withdraw();
 
     std::shared_ptr<kit::AlertController> _alert;
     std::shared_ptr<SimpleTextViewController> _errMsgViewController;
     std::shared_ptr<kit::AlertAction> _defaultAction;
     MaybeText _origFilename;
     ValidateNewFilenameCallback _validateNewFilenameCallback;
-    bool _isAccepted = false;
+    std::string _confirmedName;
+    std::function<void()> _withdraw;
+    bool _isAccepted = false, _isWaiting = false;
 };
 
 } // namespace tarrow

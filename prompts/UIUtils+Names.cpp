@@ -23,7 +23,8 @@ std::size_t characterCount(std::string_view text)
 
 } // namespace
 
-UIUtils::MaybeError UIUtils::renameItemAtURLToName(const Url& url, const std::string& name)
+UIUtils::MaybeError UIUtils::renameItemAtURLToName(
+    const Url& url, const std::string& name, const FileUtils::StillWanted& stillWanted)
 {
     static constexpr Operation op{"+[UIUtils renameItemAtURL:toName:]"};
     if (name.empty()) {
@@ -44,7 +45,19 @@ UIUtils::MaybeError UIUtils::renameItemAtURLToName(const Url& url, const std::st
         op.debug("Rename: Old and new URLs are the same: %@ - %@", resolved, destination);
         return std::nullopt;
     }
-    return FileUtils::moveTo(resolved, destination);
+    return FileUtils::moveTo(resolved, destination, stillWanted);
+}
+
+std::shared_ptr<ItemChange> UIUtils::renameItemAtURLToNameCompletion(const Url& url, const std::string& name,
+    std::function<void(const MaybeError& error)> renamed, const AccountSession& asked)
+{
+    return ItemChange::begin(
+        asked, {url},
+        [url, name](ItemChange& change) {
+            return change.isWanted() ? renameItemAtURLToName(url, name, change.stillWanted())
+                                     : MaybeError(Error(FileErrorCode::Cancelled));
+        },
+        std::move(renamed));
 }
 
 Url UIUtils::computeNewURLNewBasename(const Url& url, const std::string& name)

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "items/ItemChange.h"
 #include "platform/Error.h"
 #include "platform/Url.h"
 
@@ -39,7 +40,16 @@ public:
     /// Gives an item another name and keeps its extension, see computeNewURLNewBasename(). For a reference it
     /// renames the document that the reference stands for. Answers nothing on success, also when the item has
     /// that name already, and InvalidName for a name that is not valid.
-    static MaybeError renameItemAtURLToName(const platform::Url& url, const std::string& name);
+    /// It blocks until other readers and writers have let the item, so any thread but the main thread calls
+    /// it; see FileUtils for `stillWanted`.
+    static MaybeError renameItemAtURLToName(
+        const platform::Url& url, const std::string& name, const FileUtils::StillWanted& stillWanted = {});
+    /// Begins the same on the queue on which all items are changed, and returns at once. `renamed` is called
+    /// once, on the main thread, with what the operation above answers; FileErrorCode::Cancelled, after the
+    /// answered change was cancelled or who asked has signed out, says that the item kept its name.
+    static std::shared_ptr<ItemChange> renameItemAtURLToNameCompletion(const platform::Url& url,
+        const std::string& name, std::function<void(const MaybeError& error)> renamed,
+        const AccountSession& asked = AccountSession());
     /// Answers the location of an item under a new name. The item's extension is appended unless the new name
     /// already ends with it, regardless of case.
     static platform::Url computeNewURLNewBasename(const platform::Url& url, const std::string& name);

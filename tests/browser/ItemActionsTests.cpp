@@ -113,6 +113,9 @@ TEST_F(ItemActionsTest, ADeletionEndsWithTheAnswer)
 
     perform(DocumentListAction::Delete, budget);
     EXPECT_TRUE(alert()->press(0));
+    EXPECT_EQ(completions, 1) << "the deletion has not ended";
+    EXPECT_TRUE(isThere("Budget.txt"));
+    settle();
     EXPECT_EQ(completions, 2);
     EXPECT_FALSE(isThere("Budget.txt"));
 }
@@ -125,6 +128,7 @@ TEST_F(ItemActionsTest, FailedDeletionsAreCounted)
     std::filesystem::remove(gone.path());
     ASSERT_NE(alert(), nullptr);
     EXPECT_TRUE(alert()->press(0));
+    settle();
     EXPECT_NE(takeAlert(), "") << "the one error is shown";
     EXPECT_FALSE(isThere("kept.txt"));
 
@@ -132,6 +136,7 @@ TEST_F(ItemActionsTest, FailedDeletionsAreCounted)
     remove({gone, kept, lost});
     std::filesystem::remove(lost.path());
     EXPECT_TRUE(alert()->press(0));
+    settle();
     EXPECT_EQ(takeAlert(), "2 items couldn’t be deleted.");
     EXPECT_FALSE(isThere("kept.txt")) << "a failure does not stop the others";
     EXPECT_EQ(completions, 2);
@@ -152,6 +157,7 @@ TEST_F(ItemActionsTest, AppLibrariesAreDeletedWholeButNeverTheDrive)
     remove({recipes, *topList()->presentedURL()});
     ASSERT_NE(alert(), nullptr);
     EXPECT_TRUE(alert()->press(0));
+    settle();
     EXPECT_FALSE(std::filesystem::exists(recipes.path()));
     EXPECT_TRUE(isThere("a.txt"));
     EXPECT_EQ(takeAlert(), "Mishap exception");
@@ -227,11 +233,14 @@ TEST_F(ItemActionsTest, ItemsMoveToTheFolderThatIsChosen)
     EXPECT_EQ(picker->presentationStyle(), kit::PresentationStyle::OverCurrentContext);
     EXPECT_EQ(log->count("INFO Prompting for Move Target, 2 items"), 1);
     browser->documentTargetSelectionControllerDidSelectItemAtURL(picker, url("Folder"));
+    EXPECT_FALSE(isThere("Folder/a.txt")) << "the items move after the tap";
+    settle();
     EXPECT_TRUE(isThere("Folder/a.txt"));
     EXPECT_TRUE(isThere("b.txt")) << "nothing is replaced";
     EXPECT_EQ(takeAlert(), "An item named “b.txt” already exists in the new location.");
     EXPECT_EQ(browser->presentedViewController(), nullptr);
     browser->moveItemsToDirectoryAndShowErrorsToDirectory({url("x"), url("y")}, url("Folder"));
+    settle();
     EXPECT_EQ(takeAlert(), "2 items couldn’t be moved.");
 
     perform(DocumentListAction::Move, url("Desktop"));

@@ -183,6 +183,50 @@ TEST_F(FilenamePromptTest, ThePromptMayBeDroppedWhileItAsks)
     }
 }
 
+TEST_F(FilenamePromptTest, AnAnswerMayComeLater)
+{
+    int withdrawn = 0;
+    const auto begin = [&](const std::string& name) {
+        show(RenamePrompt::newWithFilenameCompletion(name, [&](const std::string& typed, bool&) {
+            confirmed.push_back(typed);
+            prompt->waitForAnswer([&] { ++withdrawn; });
+            return std::string("it does not count");
+        }));
+        EXPECT_FALSE(pressDone());
+    };
+    for (const bool accepted : {true, false}) {
+        begin("Notes.txt");
+        EXPECT_TRUE(isOpen());
+        EXPECT_EQ(message(), std::nullopt);
+        EXPECT_FALSE(prompt->defaultAction()->isEnabled());
+        EXPECT_FALSE(pressDone());
+        EXPECT_FALSE(field().userPressedReturn());
+        prompt->answer(accepted, "Name is already taken");
+        EXPECT_EQ(isOpen(), !accepted);
+        prompt->answer(true, {});
+        EXPECT_EQ(isOpen(), !accepted) << "there is one answer";
+    }
+    EXPECT_EQ(message(), "Name is already taken");
+    EXPECT_TRUE(field().isEditing());
+    EXPECT_FALSE(pressDone()) << "it asks again";
+    type("Plans.txt");
+    EXPECT_FALSE(prompt->defaultAction()->isEnabled()) << "the first name is not decided yet";
+    prompt->answer(false, "Name is already taken");
+    EXPECT_EQ(message(), std::nullopt) << "another name stands there now";
+    EXPECT_TRUE(prompt->defaultAction()->isEnabled());
+    EXPECT_THAT(confirmed, ElementsAre("Notes.txt", "Notes.txt", "Notes.txt"));
+    EXPECT_TRUE(alert->press(0));
+    EXPECT_EQ(withdrawn, 0) << "nothing was waited for";
+
+    begin("Notes.txt");
+    EXPECT_TRUE(alert->press(0));
+    EXPECT_FALSE(isOpen());
+    EXPECT_EQ(withdrawn, 1);
+    prompt->answer(false, "Name is already taken");
+    EXPECT_EQ(withdrawn, 1);
+    EXPECT_FALSE(prompt->isWaiting());
+}
+
 TEST_F(FilenamePromptTest, TheMessageIsAsTallAsItsText)
 {
     const auto area = std::make_shared<SimpleTextViewController>();

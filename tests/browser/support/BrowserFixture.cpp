@@ -41,6 +41,8 @@ BrowserFixture::BrowserFixture()
     auto set = drive.installed;
     set.appRegistry = apps;
     set.cloudDocumentService = cloud;
+    coordinator = std::make_shared<InterruptedCoordinator>(set.fileCoordinator);
+    set.fileCoordinator = coordinator;
     set.documentSharing = std::make_shared<RecordingSharing>();
     set.localization = std::make_shared<host::system::GettextLocalization>(
         TRW_LOCALE_FOLDER, host::system::UserLocale{"en", "en_US"});

@@ -9,6 +9,7 @@
 #include "platform/UserDefaults.h"
 #include "preview/PreviewMode.h"
 #include "tests/support/DriveFixture.h"
+#include "tests/support/ForwardingCoordinator.h"
 #include "tests/support/SimulatedApps.h"
 #include "tests/support/SimulatedCloud.h"
 #include "tests/support/SimulatedOffers.h"
@@ -24,6 +25,32 @@ class Window;
 namespace testing_support {
 
 class ShownNotices;
+
+/// Calls the test while a change waits for its turn.
+class InterruptedCoordinator : public ForwardingCoordinator {
+public:
+    using ForwardingCoordinator::ForwardingCoordinator;
+    Failure coordinateWriting(
+        const Url& url, platform::WritingOptions options, const Accessor& accessor) override
+    {
+        wait();
+        return ForwardingCoordinator::coordinateWriting(url, options, accessor);
+    }
+    Failure coordinateWriting(const Url& first, platform::WritingOptions firstOptions, const Url& second,
+        platform::WritingOptions secondOptions, const PairAccessor& accessor) override
+    {
+        wait();
+        return ForwardingCoordinator::coordinateWriting(first, firstOptions, second, secondOptions, accessor);
+    }
+    std::function<void()> whileWaiting;
+
+private:
+    void wait() const
+    {
+        if (whileWaiting)
+            whileWaiting();
+    }
+};
 
 /// A browser in a window, on the real store in a temporary folder. Only the account's token, the quota, the
 /// storage offers, other apps and the clock are simulated.
@@ -64,6 +91,7 @@ protected:
     DriveFixture drive;
     const std::shared_ptr<RecordingLog>& log = drive.log;
     const std::shared_ptr<VirtualDispatch>& dispatch = drive.dispatch;
+    std::shared_ptr<InterruptedCoordinator> coordinator;
     std::shared_ptr<SimulatedCloud> cloud;
     std::shared_ptr<SimulatedApps> apps = std::make_shared<SimulatedApps>();
     std::shared_ptr<SimulatedOffers> offers = std::make_shared<SimulatedOffers>();

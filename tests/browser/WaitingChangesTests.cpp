@@ -1,0 +1,172 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
+#include "kit/controllers/AlertController.h"
+#include "kit/views/Label.h"
+#include "kit/views/TextField.h"
+#include "prompts/FilenamePrompt.h"
+#include "prompts/SimpleTextViewController.h"
+#include "screens/list/DocumentListController.h"
+#include "tests/browser/support/BrowserFixture.h"
+
+namespace tarrow {
+namespace {
+
+using namespace testing_support;
+using platform::Notification;
+using platform::Url;
+
+/// Something happens while a change that a person has confirmed waits for its turn.
+class WaitingChangesTest : public BrowserFixture {
+protected:
+    /// A name prompt over the root list, and what its confirmation changes.
+    struct Prompt {
+        const char* name;
+        std::function<void()> open;
+        const char* typed;
+        const char* made; ///< is there when the change has happened
+    };
+    std::vector<Prompt> prompts()
+    {
+        return {
+            {"rename", [this] { browser->showRenamePrompt(url("a.txt")); }, "b.txt", "b.txt"},
+            {"new folder", [this] { browser->promtForNewFolderAndCreate(nullptr); }, "New", "New"},
+            {"new folder for an item",
+                [this] {
+                    browser->showNewFolderPromptDuringMoveItemsToMove(
+                        topList()->presentedURL(), {url("a.txt")});
+                },
+                "New", "New/a.txt"},
+        };
+    }
+    /// Opens a prompt over a fresh drive and confirms it; `happens` runs while the change waits.
+    void confirm(const Prompt& prompt, std::function<void()> happens)
+    {
+        coordinator->whileWaiting = {};
+        for (const char* name : {"b.txt", "New"})
+            std::filesystem::remove_all(url(name).path());
+        cloud->token = platform::PropertyValue("account-1");
+        write("a.txt");
+        write("other.txt");
+        launch();
+        post(Notification::ApplicationDidBecomeActive);
+        prompt.open();
+        settle();
+        ASSERT_NE(alert(), nullptr);
+        browser->folderPromptAlert()->alert()->textFields().front()->userEdited(prompt.typed, {0, 0});
+        EXPECT_FALSE(alert()->press(1)) << "the prompt waits";
+        EXPECT_FALSE(isThere(prompt.made)) << "nothing happens within the tap";
+        coordinator->whileWaiting = std::move(happens);
+        settle();
+    }
+    /// Answers the message of the prompt on the screen.
+    std::string message() const
+    {
+        return browser->folderPromptAlert()->errMsgViewController()->messageLabel()->text();
+    }
+    void signOut()
+    {
+        cloud->token = std::nullopt;
+        drive.notifications->post(Notification::CloudIdentityDidChange);
+    }
+    bool isThere(std::string_view path) const { return std::filesystem::exists(url(path).path()); }
+};
+
+TEST_F(WaitingChangesTest, APromptWaitsAndClosesWithTheChange)
+{
+    for (const auto& prompt : prompts()) {
+        SCOPED_TRACE(prompt.name);
+        int waits = 0;
+        confirm(prompt, [&] {
+            ++waits;
+            ASSERT_NE(alert(), nullptr);
+            EXPECT_FALSE(alert()->press(1)) << "a second press";
+        });
+        EXPECT_EQ(alert(), nullptr);
+        EXPECT_TRUE(isThere(prompt.made));
+        EXPECT_EQ(waits, prompt.made == std::string("New/a.txt") ? 2 : 1);
+    }
+}
+
+TEST_F(WaitingChangesTest, CancelTakesTheChangeBack)
+{
+    for (const auto& prompt : prompts()) {
+        SCOPED_TRACE(prompt.name);
+        confirm(prompt, [this] {
+            if (alert())
+                alert()->press(0);
+        });
+        EXPECT_EQ(alert(), nullptr);
+        EXPECT_TRUE(isThere("a.txt"));
+        EXPECT_FALSE(isThere(prompt.typed));
+    }
+}
+
+TEST_F(WaitingChangesTest, ASignOutTakesTheChangeBack)
+{
+    for (const auto& prompt : prompts()) {
+        SCOPED_TRACE(prompt.name);
+        confirm(prompt, [this] { signOut(); });
+        EXPECT_EQ(alert(), nullptr);
+        EXPECT_TRUE(isThere("a.txt"));
+        EXPECT_FALSE(isThere(prompt.typed));
+    }
+}
+
+TEST_F(WaitingChangesTest, AChangeGoesOnWithoutItsPromptAndSaysWhyItFailed)
+{
+    for (const auto& prompt : prompts()) {
+        for (const bool fails : {false, true}) {
+            SCOPED_TRACE(std::string(prompt.name) + (fails ? ", fails" : ""));
+            confirm(prompt, [&] {
+                browser->warpToNewURLPreviewMode(url("other.txt"), PreviewModeQuick);
+                EXPECT_EQ(alert(), nullptr);
+                if (fails)
+                    std::filesystem::remove(url("a.txt").path());
+            });
+            const bool needsItem = prompt.name != std::string("new folder");
+            EXPECT_EQ(isThere(prompt.made), !fails || !needsItem);
+            EXPECT_EQ(alert() != nullptr, fails && needsItem);
+        }
+    }
+}
+
+TEST_F(WaitingChangesTest, AnItemThatIsGoneMeanwhileIsSaidInThePrompt)
+{
+    for (const auto& prompt : prompts()) {
+        if (prompt.name == std::string("new folder"))
+            continue;
+        SCOPED_TRACE(prompt.name);
+        confirm(prompt, [this] { std::filesystem::remove(url("a.txt").path()); });
+        ASSERT_NE(alert(), nullptr);
+        EXPECT_NE(message(), "");
+    }
+}
+
+TEST_F(WaitingChangesTest, ASignOutEndsADeletionBetweenItsItems)
+{
+    std::vector<Url> items;
+    for (const char* name : {"1.txt", "2.txt", "3.txt"})
+        items.push_back(write(name));
+    launch();
+    post(Notification::ApplicationDidBecomeActive);
+    int finished = 0, waits = 0;
+    browser->showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(
+        items, nullptr, topList(), [&] { ++finished; });
+    settle();
+    coordinator->whileWaiting = [&] {
+        if (++waits == 2)
+            signOut();
+    };
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_TRUE(alert()->press(0));
+    settle();
+    EXPECT_FALSE(isThere("1.txt"));
+    EXPECT_TRUE(isThere("2.txt") && isThere("3.txt"));
+    EXPECT_EQ(waits, 2);
+    EXPECT_EQ(finished, 1);
+    EXPECT_EQ(alert(), nullptr) << "what was taken back has not failed";
+}
+
+} // namespace
+} // namespace tarrow
