@@ -40,8 +40,9 @@ public:
     /// Called once, after saved state was restored. The loop ignores the answer.
     virtual bool applicationDidFinishLaunchingWithOptions(
         Application& application, const LaunchOptions& options) = 0;
-    /// Called whenever the window loses the focus, is closed, or the process ends; the state is saved right
-    /// after it. Notification::ApplicationWillResignActive follows.
+    /// Called whenever the window is minimised or closed, or the process ends. Then
+    /// Notification::ApplicationWillResignActive follows, and the state is saved. A window that only loses
+    /// the focus stays active, because the user may look at it beside another one.
     virtual void applicationWillResignActive(Application& application) = 0;
     /// Called each time before the interface's state is saved. The delegate may add values of its own to the
     /// coder. When it answers false nothing is kept, and what was kept before is removed.

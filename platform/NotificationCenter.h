@@ -14,8 +14,9 @@ namespace platform {
 /// The notices that travel through the notification center. Their user information is empty unless a comment
 /// says otherwise.
 enum class Notification {
-    ApplicationDidBecomeActive, ///< the launch ended, or the window got the focus
-    ApplicationWillResignActive, ///< the window lost the focus or was closed, or the process is ending
+    ApplicationDidBecomeActive, ///< the launch ended, or the window is no longer minimised
+    ApplicationWillResignActive, ///< the window was minimised or closed, or the process is ending
+    ApplicationDidLoseFocus, ///< the user turned to another window, which is a moment to save
     ApplicationWillTerminate, ///< the process ends: work that is put into a queue now does not run any more
     CloudIdentityDidChange, ///< another account, or none, is signed in; see CloudAccount
     StorageOfferDidChange, ///< there is another offer, or none any more; see StorageOfferManager

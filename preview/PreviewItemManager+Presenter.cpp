@@ -222,6 +222,18 @@ void PreviewItemManager::popPreview(const std::string& notice)
         window->showNotice(notice);
 }
 
+/// Looks at what happened to the item while nobody followed it.
+void PreviewItemManager::lookAgain()
+{
+    const auto url = itemURL();
+    if (!url)
+        return;
+    if (DRItem::initWithURL(*url))
+        return refreshItem(*url);
+    unregisterAsFilePresenter();
+    popPreview(localized("“%@” is no longer there.", {shownName(url)}));
+}
+
 void PreviewItemManager::accommodatePresentedSubitemDeletionAtURLCompletionHandler(
     const Url& url, CompletionHandler completion)
 {

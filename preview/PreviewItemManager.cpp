@@ -139,7 +139,10 @@ void PreviewItemManager::didBecomeActiveNotification()
 {
     static constexpr Operation op{"-[PreviewItemManager didBecomeActiveNotification:]"};
     op.debug("Becoming active for %@", itemURL());
+    const bool hasFollowed = filePresenterRegistered();
     registerAsFilePresenter();
+    if (!hasFollowed)
+        lookAgain();
 }
 
 void PreviewItemManager::willResignActiveNotification()

@@ -141,6 +141,7 @@ private:
     /// Forgets the item, which is gone from where it was shown, and tells the user why.
     void leaveItem(const std::string& notice);
     void popPreview(const std::string& notice);
+    void lookAgain();
     void refreshAfterSubitemDeletion();
     void clearRefreshPending();
     void refreshScreens(const DRItem& item, bool isElsewhere, bool isNewer, bool wasDownloaded);

@@ -97,8 +97,9 @@ void PreviewController::editingBegan(const Result<Editing>& begun)
     _edited.push_back(editing);
     auto& center = services().notificationCenter();
     _observations.clear();
-    _observations.push_back(center.observe(
-        Notification::ApplicationWillResignActive, weakly(this, &PreviewController::keepEdits)));
+    for (const auto notice :
+        {Notification::ApplicationDidLoseFocus, Notification::ApplicationWillResignActive})
+        _observations.push_back(center.observe(notice, weakly(this, &PreviewController::keepEdits)));
     _observations.push_back(center.observe(
         Notification::ApplicationWillTerminate, weakly(this, &PreviewController::programEnds)));
     showEditBars();

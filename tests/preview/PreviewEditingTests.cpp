@@ -248,11 +248,16 @@ TEST_F(PreviewEditingTest, FollowsAMoveAndSavesWhereTheProgramIsLeftOrEnds)
     EXPECT_EQ(written(moved), "Ada");
     EXPECT_FALSE(fs::exists(item.path()));
 
-    fillIn("Ada");
-    drive.notifications->post(Notification::ApplicationWillResignActive);
-    drive.dispatch->runUntilIdle();
-    EXPECT_EQ(written(item), "Ada");
-    EXPECT_TRUE(preview->editor());
+    fillIn("");
+    for (const auto notice :
+        {Notification::ApplicationDidLoseFocus, Notification::ApplicationWillResignActive}) {
+        const auto text = "Ada" + std::to_string(static_cast<int>(notice));
+        preview->editor()->fieldBar()->textField()->userEdited(text, {});
+        drive.notifications->post(notice);
+        drive.dispatch->runUntilIdle();
+        EXPECT_EQ(written(item), text);
+        EXPECT_TRUE(preview->editor());
+    }
     preview->editor()->fieldBar()->textField()->userEdited("Bob", {});
     drive.notifications->post(Notification::ApplicationWillTerminate);
     EXPECT_EQ(written(item), "Bob") << "without any queue";

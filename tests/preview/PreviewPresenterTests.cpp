@@ -247,6 +247,29 @@ TEST_F(Presenter, HandsTheDocumentOverWhileItIsWatched)
     EXPECT_TRUE(std::filesystem::is_empty(published));
 }
 
+TEST_F(Presenter, LooksAgainWhenTheWindowIsNoLongerMinimised)
+{
+    const auto url = open("Notes.txt");
+    drive.notifications->post(Notification::ApplicationDidLoseFocus);
+    EXPECT_TRUE(manager->filePresenterRegistered()) << "it may stand beside another window";
+    drive.notifications->post(Notification::ApplicationDidBecomeActive);
+    EXPECT_EQ(refreshes(), 0) << "whoever follows need not look";
+
+    drive.notifications->post(Notification::ApplicationWillResignActive);
+    save(url, "changed meanwhile", 10);
+    drive.notifications->post(Notification::ApplicationDidBecomeActive);
+    drive.dispatch->runUntilIdle();
+    EXPECT_EQ(preview->content()->text, "changed meanwhile");
+
+    drive.notifications->post(Notification::ApplicationWillResignActive);
+    std::filesystem::remove(url.path());
+    drive.settle();
+    EXPECT_THAT(stack(), ElementsAre("-", "*"));
+    drive.notifications->post(Notification::ApplicationDidBecomeActive);
+    EXPECT_THAT(stack(), ElementsAre("-"));
+    EXPECT_FALSE(manager->filePresenterRegistered());
+}
+
 TEST_F(Presenter, HandsOverNothingThatOthersCannotOpen)
 {
     const auto outside = Url::fileURL(drive.folder().write("outside.txt", "text"));

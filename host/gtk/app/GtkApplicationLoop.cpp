@@ -303,7 +303,8 @@ void GtkApplicationLoop::launch(std::optional<ShortcutItem> shortcut)
 void GtkApplicationLoop::windowShown(WindowPeer& window)
 {
     window.context()->firstList().setOnShown(_settings.onFirstList);
-    window.setOnActive([this](bool active) { activeChanged(active); });
+    window.setOnMinimized([this](bool minimized) { activeChanged(!minimized); });
+    window.setOnFocusLost([this] { focusLost(); });
     window.setOnClosed([this] { resignActive(); });
     _handOver = HandOverToasts::make(
         window.toasts(), [this](const UserActivity& activity) { continueActivity(activity); },
@@ -386,6 +387,15 @@ void GtkApplicationLoop::resignActive()
         return;
     _delegate->applicationWillResignActive(*this);
     platform::services().notificationCenter().post(Notification::ApplicationWillResignActive);
+    saveState();
+}
+
+/// The state is saved here as well, because the user may end the session from another window.
+void GtkApplicationLoop::focusLost()
+{
+    if (!_active)
+        return;
+    platform::services().notificationCenter().post(Notification::ApplicationDidLoseFocus);
     saveState();
 }
 

@@ -48,6 +48,7 @@ private:
     void failedToContinue(const platform::UserActivity& activity, const platform::Error& error);
     void activeChanged(bool active);
     void resignActive();
+    void focusLost();
     void windowShown(WindowPeer& window);
 
     ApplicationSettings _settings;

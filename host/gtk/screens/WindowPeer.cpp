@@ -54,6 +54,7 @@ WindowPeer::WindowPeer(AdwApplication* application, const std::shared_ptr<kit::W
 WindowPeer::~WindowPeer()
 {
     _connections.clear();
+    _stateConnection.disconnect();
     kit::TextMeasurer::install(nullptr);
     _layers.clear();
     _leaving.clear();
@@ -82,13 +83,27 @@ void WindowPeer::build(AdwApplication* application, const WindowSize& size)
 void WindowPeer::connectWindow()
 {
     _connections.push_back(connectNotify(_window.get(), "notify::is-active", [this] {
-        if (const auto call = _onActive)
-            call(gtk_window_is_active(window()));
+        if (const auto call = _onFocusLost; call && !gtk_window_is_active(window()))
+            call();
     }));
+    _connections.push_back(connectSignal<void()>(_window.get(), "realize", [this] { connectSurface(); }));
     _connections.push_back(connectSignal<gboolean()>(_window.get(), "close-request", [this]() -> gboolean {
         closed();
         return FALSE;
     }));
+}
+
+void WindowPeer::connectSurface()
+{
+    auto* surface = gtk_native_get_surface(GTK_NATIVE(_window.get()));
+    _stateConnection = connectNotify(surface, "notify::state", [this, surface] {
+        const bool isMinimized =
+            (gdk_toplevel_get_state(GDK_TOPLEVEL(surface)) & GDK_TOPLEVEL_STATE_MINIMIZED) != 0;
+        if (std::exchange(_isMinimized, isMinimized) == isMinimized)
+            return;
+        if (const auto call = _onMinimized)
+            call(isMinimized);
+    });
 }
 
 void WindowPeer::connectInput()

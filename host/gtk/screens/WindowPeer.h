@@ -46,8 +46,11 @@ public:
     ScreenPeer* rootPeer() const { return _root.get(); }
     std::shared_ptr<kit::Window> model() const { return _model.lock(); }
     WindowSize currentSize() const;
-    /// The callback runs when the window becomes or is no longer the active one.
-    void setOnActive(std::function<void(bool)> callback) { _onActive = std::move(callback); }
+    /// The callback runs when the window is minimised, and with false when it is shown again. A Wayland
+    /// compositor does not tell.
+    void setOnMinimized(std::function<void(bool)> callback) { _onMinimized = std::move(callback); }
+    /// The callback runs when the user turns to another window.
+    void setOnFocusLost(std::function<void()> callback) { _onFocusLost = std::move(callback); }
     /// The callback runs before the window's screens disappear because the user closed it.
     void setOnClosed(std::function<void()> callback) { _onClosed = std::move(callback); }
 
@@ -70,6 +73,7 @@ private:
     void build(AdwApplication* application, const WindowSize& size);
     void connectInput();
     void connectWindow();
+    void connectSurface();
     void showRoot();
     void resized(platform::Size size);
     kit::TraitCollection traits(platform::Size size) const;
@@ -92,9 +96,12 @@ private:
     std::shared_ptr<ScreenPeer> _root;
     std::vector<Layer> _layers; ///< the topmost last
     std::vector<std::shared_ptr<PresentedLayer>> _leaving;
-    std::function<void(bool)> _onActive;
+    bool _isMinimized = false;
+    std::function<void(bool)> _onMinimized;
+    std::function<void()> _onFocusLost;
     std::function<void()> _onClosed;
     SignalConnections _connections;
+    SignalConnection _stateConnection; ///< to the window's surface
 };
 
 } // namespace host::gtk

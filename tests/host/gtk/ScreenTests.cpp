@@ -9,6 +9,9 @@
 #include "kit/views/ListView.h"
 #include "kit/views/TextField.h"
 
+#include <X11/Xatom.h>
+#include <gdk/x11/gdkx.h>
+
 #include <algorithm>
 #include <map>
 #include <numeric>
@@ -54,6 +57,32 @@ TEST_F(NavigationTests, TheShownPageIsTheTopScreen)
     settle();
     EXPECT_EQ(shownTitle(), "First");
     EXPECT_EQ(visible(), navigationPeer().topPage()->widget());
+}
+
+/// A window manager tells by a property that it has minimised the window.
+void setMinimized(GtkWindow* window, bool isMinimized)
+{
+    auto* surface = gtk_native_get_surface(GTK_NATIVE(window));
+    auto* display = gdk_surface_get_display(surface);
+    const auto atom = [display](
+                          const char* name) { return gdk_x11_get_xatom_by_name_for_display(display, name); };
+    const Atom hidden = atom("_NET_WM_STATE_HIDDEN");
+    XChangeProperty(gdk_x11_display_get_xdisplay(display), gdk_x11_surface_get_xid(surface),
+        atom("_NET_WM_STATE"), XA_ATOM, 32, PropModeReplace, reinterpret_cast<const unsigned char*>(&hidden),
+        isMinimized ? 1 : 0);
+}
+
+TEST_F(NavigationTests, TheWindowTellsWhenItIsMinimisedAndShownAgain)
+{
+    show(makeScreen("First"));
+    std::vector<bool> told;
+    peer().setOnMinimized([&told](bool isMinimized) { told.push_back(isMinimized); });
+    for (const bool isMinimized : {true, false}) {
+        const auto before = told.size();
+        setMinimized(peer().window(), isMinimized);
+        waitFor([&] { return told.size() > before; }, "the window's state");
+        EXPECT_EQ(told.back(), isMinimized);
+    }
 }
 
 TEST_F(NavigationTests, ASwipeTakesTheModelAlong)
