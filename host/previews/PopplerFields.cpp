@@ -50,8 +50,9 @@ bool readText(PopplerFormField* handle, FormField& field)
         return false;
     field.kind = Kind::Text;
     field.text = takenText(poppler_form_field_text_get_text(handle));
-    field.isMultiline = type == POPPLER_FORM_TEXT_MULTILINE;
     field.isSecret = poppler_form_field_text_is_password(handle) != FALSE;
+    // A text of several lines is written in a view that cannot hide it.
+    field.isMultiline = type == POPPLER_FORM_TEXT_MULTILINE && !field.isSecret;
     field.maxLength = static_cast<std::size_t>(std::max(0, poppler_form_field_text_get_max_len(handle)));
     return true;
 }

@@ -22,6 +22,7 @@ struct TextInputTraits {
     Capitalization capitalization = Capitalization::Sentences;
     Autocorrection autocorrection = Autocorrection::Default;
     ClearButton clearButton = ClearButton::Never;
+    bool isSecret = false; ///< the text is neither shown nor spoken, as a password
     bool operator==(const TextInputTraits&) const = default;
 };
 

@@ -69,7 +69,6 @@ void PreviewFieldBar::build()
     _name = std::make_shared<kit::Label>();
     _name->setFont(kit::Font::preferred(kit::TextStyle::Footnote));
     _text = std::make_shared<kit::TextField>();
-    _text->setInputTraits({.returnKey = kit::ReturnKey::Done, .clearButton = kit::ClearButton::WhileEditing});
     _text->setDelegate(std::shared_ptr<kit::TextFieldDelegate>(shared_from_this(), this));
     _button = std::make_shared<kit::Button>(std::string(), weakly(this, [](PreviewFieldBar& self) {
         if (const auto call = self._onPress)
@@ -87,6 +86,9 @@ void PreviewFieldBar::setField(const FormField& field)
     _field = field;
     _name->setText(name);
     _text->setHidden(!isWritten(field));
+    _text->setInputTraits({.returnKey = kit::ReturnKey::Done,
+        .clearButton = kit::ClearButton::WhileEditing,
+        .isSecret = field.isSecret});
     _button->setHidden(isWritten(field));
     _text->setAccessibilityLabel(name);
     if (isWritten(field) && !isBeingWritten && _text->text() != field.text)

@@ -210,6 +210,20 @@ TEST_F(PreviewEditingTest, LeavingSavesAndNeverReplacesWhatAnotherProgramWrote)
     EXPECT_EQ(preview->content()->pages->pageCount(), 1U) << "theirs is shown";
 }
 
+TEST_F(PreviewEditingTest, HidesWhatIsWrittenInASecretField)
+{
+    auto content = formPdf();
+    content.replace(content.find("/Ff 4096"), 8, "/Ff 8192");
+    show(content);
+    edit();
+    const auto isHidden = [&] { return preview->editor()->fieldBar()->textField()->inputTraits().isSecret; };
+    press(EditTool::PreviousField);
+    EXPECT_EQ(preview->editor()->fieldBar()->nameLabel()->text(), "remarks");
+    EXPECT_TRUE(isHidden());
+    press(EditTool::NextField);
+    EXPECT_FALSE(isHidden());
+}
+
 TEST_F(PreviewEditingTest, AFailedSaveLosesNothing)
 {
     fillIn("Ada");

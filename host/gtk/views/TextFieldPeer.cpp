@@ -30,6 +30,8 @@ GtkInputHints hints(const kit::TextInputTraits& traits)
         hints |= GTK_INPUT_HINT_UPPERCASE_WORDS;
     else if (traits.capitalization == kit::Capitalization::Sentences)
         hints |= GTK_INPUT_HINT_UPPERCASE_SENTENCES;
+    if (traits.isSecret)
+        hints |= GTK_INPUT_HINT_NO_SPELLCHECK | GTK_INPUT_HINT_NO_EMOJI | GTK_INPUT_HINT_PRIVATE;
     return static_cast<GtkInputHints>(hints);
 }
 
@@ -109,6 +111,9 @@ void TextFieldPeer::mirrorContent(const kit::TextField& field)
     const auto& traits = field.inputTraits();
     gtk_entry_set_placeholder_text(entry, field.placeholder().c_str());
     gtk_entry_set_input_hints(entry, hints(traits));
+    gtk_entry_set_input_purpose(
+        entry, traits.isSecret ? GTK_INPUT_PURPOSE_PASSWORD : GTK_INPUT_PURPOSE_FREE_FORM);
+    gtk_entry_set_visibility(entry, !traits.isSecret);
     gtk_entry_set_attributes(entry, TextLayout::attributes(context().theme(), field.font(), nullptr).get());
     mirrorClearButton(field);
     gtk_editable_set_alignment(

@@ -129,6 +129,17 @@ TEST_F(PeerTests, AFieldFollowsTheEditsThatItsDelegateAllows)
     EXPECT_STREQ(gtk_editable_get_text(editable), "Reports.pdf");
 }
 
+TEST_F(PeerTests, AFieldHidesASecretAndShowsTheNextText)
+{
+    const auto field = std::make_shared<kit::TextField>("open sesame");
+    showOne(field, {10, 10, 300, 40});
+    for (const bool isSecret : {true, false}) {
+        field->setInputTraits({.isSecret = isSecret});
+        settle();
+        EXPECT_EQ(gtk_entry_get_visibility(GTK_ENTRY(nativeOf(*field))) != FALSE, !isSecret);
+    }
+}
+
 TEST_F(PeerTests, StandardColoursFollowTheTheme)
 {
     showOne(std::make_shared<kit::View>(), {});
