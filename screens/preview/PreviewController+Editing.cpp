@@ -199,28 +199,38 @@ void PreviewController::kept(const Editing& editing, const EditsKept& outcome)
 {
     const bool isBeingEdited = _editor && _editor->editing() == editing;
     const bool isShown = isBeingEdited || (!_editor && _item == outcome.place);
-    if (!isBeingEdited)
+    if (!isBeingEdited && !editing->hasUnsavedEdits())
         std::erase(_edited, editing);
     switch (outcome.where) {
     case EditsKept::Where::Document:
         if (isShown)
             _savedVersion = outcome.version;
         return;
-    case EditsKept::Where::Copy: {
+    case EditsKept::Where::Copy:
         // The document now holds the other program's content, so these edits cannot be continued in it.
-        const auto item = editing->item();
-        if (isBeingEdited)
-            removeEditor();
-        std::erase(_edited, editing);
-        _savedVersion.reset();
-        if (_item == item)
-            refreshCurrentPreviewItem();
-        return alert(messageAlert(localized("“%@” was changed by another program", {nameOf(item)}),
+        if (keepsRest(editing, &PreviewController::kept))
+            return;
+        showOnDisk(editing);
+        return alert(messageAlert(localized("“%@” was changed by another program", {nameOf(editing->item())}),
             localized("Your changes are kept in a copy, “%@”.", {nameOf(outcome.place)})));
-    }
     case EditsKept::Where::Nowhere:
         return askAfterFailure(editing, outcome);
     }
+}
+
+/// Stops changing a document whose edits went into a copy, and saves there what was changed meanwhile.
+/// Answers false when nothing was.
+bool PreviewController::keepsRest(const Editing& editing, KeptHandler told)
+{
+    if (_editor && _editor->editing() == editing)
+        removeEditor();
+    // The later save says where the edits are.
+    if (editing->isBeingKept())
+        return true;
+    if (!editing->hasUnsavedEdits())
+        return false;
+    editing->save(weakly(this, told, editing));
+    return true;
 }
 
 void PreviewController::askAfterFailure(const Editing& editing, const EditsKept& outcome)
@@ -262,6 +272,8 @@ void PreviewController::keptCopy(const Editing& editing, const EditsKept& outcom
 {
     if (outcome.where == EditsKept::Where::Nowhere)
         return askAfterFailure(editing, outcome);
+    if (keepsRest(editing, &PreviewController::keptCopy))
+        return;
     showOnDisk(editing);
     alert(messageAlert(
         localized("Your changes are kept"), localized("They are in a copy, “%@”.", {nameOf(outcome.place)})));

@@ -121,6 +121,8 @@ private:
     void leaveEditing(const std::optional<Url>& newItem = std::nullopt);
     void keep(const std::shared_ptr<PreviewEditing>& editing);
     void kept(const std::shared_ptr<PreviewEditing>& editing, const EditsKept& outcome);
+    using KeptHandler = void (PreviewController::*)(const std::shared_ptr<PreviewEditing>&, const EditsKept&);
+    bool keepsRest(const std::shared_ptr<PreviewEditing>& editing, KeptHandler told);
     void askForUnsaved(const std::shared_ptr<PreviewEditing>& editing);
     void addCopyAndDiscard(kit::AlertController& question, const std::shared_ptr<PreviewEditing>& editing);
     void keptCopy(const std::shared_ptr<PreviewEditing>& editing, const EditsKept& outcome);

@@ -6,6 +6,7 @@
 #include "platform/Dispatch.h"
 #include "platform/FileCoordinator.h"
 #include "platform/Services.h"
+#include "screens/preview/TextDecoding.h"
 
 #include <algorithm>
 #include <deque>
@@ -20,14 +21,18 @@ constexpr int mostCopies = 1000; ///< copies of one document
 /// Nobody fills in a form of more pages by hand, so its fields are not read.
 constexpr std::size_t mostPagesOfForm = 2000;
 
-/// "Plan.pdf" becomes "Plan 2.pdf".
+/// "Plan.pdf" becomes "Plan 2.pdf". Of a long name the end before the extension is left out.
 std::string copyName(const std::string& name, int number)
 {
+    constexpr std::size_t longestName = 255; // bytes; the limit of Linux file systems
     if (number == 1)
         return name;
     const auto dot = name.rfind('.');
     const auto end = dot == std::string::npos || dot == 0 ? name.size() : dot;
-    return name.substr(0, end) + ' ' + std::to_string(number) + name.substr(end);
+    const auto tail = ' ' + std::to_string(number) + name.substr(end);
+    const auto room = longestName - std::min(tail.size(), longestName);
+    const std::string_view stem(name.data(), end);
+    return std::string(end <= room ? stem : withoutCutCharacter(stem.substr(0, room))) + tail;
 }
 
 } // namespace
@@ -55,6 +60,26 @@ public:
     {
         while (runNext()) { }
     }
+
+    std::optional<Error> apply(unsigned number, const PageEdit& edit)
+    {
+        auto error = document->apply(edit);
+        if (!error)
+            _steps.push_back(number);
+        return error;
+    }
+
+    /// Takes an edit back unless it was refused. The edit before it would be taken back in its place.
+    void undo(unsigned number)
+    {
+        if (lastStep() != number)
+            return;
+        document->undo();
+        _steps.pop_back();
+    }
+
+    /// Answers the number of the last edit in force, or 0.
+    unsigned lastStep() const { return _steps.empty() ? 0 : _steps.back(); }
 
     EditsKept keep(EditsPlace place, const Url& item)
     {
@@ -111,7 +136,7 @@ private:
     {
         Result<ItemVersion> replaced = Error(FileErrorCode::Cancelled);
         const auto refused = services().fileCoordinator().coordinateWriting(
-            item, WritingOptions::ForReplacing, [&](const Url& location) {
+            _copy.value_or(item), WritingOptions::ForReplacing, [&](const Url& location) {
                 replaced = services().fileChanges().replaceContent(location.path(), _content, bytes);
             });
         if (refused)
@@ -121,12 +146,13 @@ private:
         if (!replaced.value)
             return {EditsKept::Where::Nowhere, item, replaced.error};
         _content = {std::make_shared<const std::string>(bytes), *replaced.value};
-        return {EditsKept::Where::Document, item, std::nullopt, *replaced.value};
+        return {_copy ? EditsKept::Where::Copy : EditsKept::Where::Document, _copy.value_or(item),
+            std::nullopt, *replaced.value};
     }
 
     /// Writes a new document beside the original. The first copy has the original's own name, which is free
-    /// when the original is gone.
-    static EditsKept writeCopy(const Url& item, const std::string& bytes, int firstNumber)
+    /// when the original is gone. Later edits are saved in the copy.
+    EditsKept writeCopy(const Url& item, const std::string& bytes, int firstNumber)
     {
         const auto folder = item.deletingLastPathComponent();
         std::optional<Error> error;
@@ -136,8 +162,14 @@ private:
                 copy, WritingOptions::None, [&](const Url& location) {
                     error = services().fileChanges().addDocument(location.path(), item.path(), bytes);
                 });
-            if (refused || !error)
-                return {refused ? EditsKept::Where::Nowhere : EditsKept::Where::Copy, copy, refused};
+            if (refused)
+                return {EditsKept::Where::Nowhere, copy, refused};
+            if (!error) {
+                _copy = copy;
+                // Without a version the next save compares the bytes.
+                _content = {std::make_shared<const std::string>(bytes), {}};
+                return {EditsKept::Where::Copy, copy, std::nullopt};
+            }
             if (!error->is(FileErrorCode::ItemExists))
                 break;
         }
@@ -148,7 +180,10 @@ private:
     std::mutex _running; ///< locked while a step runs
     std::mutex _mutex;
     std::deque<std::function<void()>> _waiting;
-    FileContent _content; ///< the content on the disk at the last look; only steps use it
+    // Only steps use these.
+    FileContent _content; ///< the content on the disk at the last look
+    std::optional<Url> _copy; ///< where the edits are since they could not be kept in the document
+    std::vector<unsigned> _steps; ///< numbers of the edits in force, in their order
 };
 
 void PreviewEditing::begin(const Url& item, Opened opened)
@@ -196,7 +231,7 @@ void PreviewEditing::apply(PageEdit edit, Stepped done)
     _steps.push_back(++_lastStep);
     post([self = shared_from_this(), number = _lastStep, work = _work, edit = std::move(edit),
              done = std::move(done)]() -> std::function<void()> {
-        return [self, number, done, error = work->document->apply(edit)] {
+        return [self, number, done, error = work->apply(number, edit)] {
             if (error)
                 std::erase(self->_steps, number);
             done(error);
@@ -208,9 +243,10 @@ void PreviewEditing::undo(Stepped done)
 {
     if (_steps.empty())
         return;
+    const auto number = _steps.back();
     _steps.pop_back();
-    post([work = _work, done = std::move(done)]() -> std::function<void()> {
-        work->document->undo();
+    post([work = _work, number, done = std::move(done)]() -> std::function<void()> {
+        work->undo(number);
         return [done] { done(std::nullopt); };
     });
 }
@@ -247,13 +283,16 @@ void PreviewEditing::saveCopy(Kept kept)
 
 void PreviewEditing::keep(EditsPlace place, Kept kept)
 {
-    post([self = shared_from_this(), work = _work, item = _item, other = _otherPlace, place, step = current(),
+    ++_savesUnderWay;
+    post([self = shared_from_this(), work = _work, item = _item, other = _otherPlace, place,
              kept = std::move(kept)]() -> std::function<void()> {
-        return [self, step, kept, outcome = work->keep(place, work->placeOf(item, other))] {
-            if (outcome.where != EditsKept::Where::Nowhere)
-                self->_kept = step;
-            kept(outcome);
-        };
+        return
+            [self, step = work->lastStep(), kept, outcome = work->keep(place, work->placeOf(item, other))] {
+                --self->_savesUnderWay;
+                if (outcome.where != EditsKept::Where::Nowhere)
+                    self->_kept = step;
+                kept(outcome);
+            };
     });
 }
 

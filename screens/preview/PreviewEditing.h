@@ -12,6 +12,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
 namespace screens {
 
@@ -59,13 +60,15 @@ public:
     bool canUndo() const { return !_steps.empty(); }
     /// Answers whether there are edits that are neither in the document nor in a copy.
     bool hasUnsavedEdits() const { return current() != _kept; }
+    /// Answers whether a save is under way, whose callback is still to come.
+    bool isBeingKept() const { return _savesUnderWay > 0; }
     /// Reads all fields of the form, page by page.
     void readFields(std::function<void(std::vector<FormField>)> completion);
     /// Answers whether the document's content differs from the one that was last read or saved here.
     void checkItem(std::function<void(bool isChanged)> completion);
 
     /// Replaces the document on the disk by the edited one. When another program has changed the document
-    /// meanwhile, the edits go into a copy instead.
+    /// meanwhile, the edits go into a copy instead, and later ones are saved in that copy.
     void save(Kept kept);
     /// Writes the edits into a new document beside the original.
     void saveCopy(Kept kept);
@@ -90,6 +93,7 @@ private:
     std::vector<unsigned> _steps; ///< numbers of the edits in force, in their order
     unsigned _lastStep = 0;
     unsigned _kept = 0; ///< the last step that was saved
+    int _savesUnderWay = 0;
 };
 
 } // namespace screens

@@ -27,19 +27,6 @@ const char* guessedUtf16(std::string_view bytes)
     return isMany(0) ? "UTF-16BE" : isMany(1) ? "UTF-16LE" : nullptr;
 }
 
-/// Answers the bytes without an incomplete character at their end.
-std::string_view withoutCutCharacter(std::string_view bytes)
-{
-    for (std::size_t back = 1; back <= std::min<std::size_t>(4, bytes.size()); ++back) {
-        const auto byte = static_cast<unsigned char>(bytes[bytes.size() - back]);
-        if ((byte & 0xC0) == 0x80)
-            continue;
-        const std::size_t length = byte >= 0xF0 ? 4 : byte >= 0xE0 ? 3 : byte >= 0xC0 ? 2 : 1;
-        return length > back ? bytes.substr(0, bytes.size() - back) : bytes;
-    }
-    return bytes;
-}
-
 /// Answers whether the text switches between alphabets of ASCII bytes, as Japanese mail does. Such a text is
 /// well-formed UTF-8 as well.
 bool switchesAlphabets(std::string_view bytes)
@@ -79,12 +66,24 @@ std::string decodedText(std::string_view bytes, TextEnd end, const TextDecoder& 
     return text;
 }
 
+std::string_view withoutCutCharacter(std::string_view bytes)
+{
+    for (std::size_t back = 1; back <= std::min<std::size_t>(4, bytes.size()); ++back) {
+        const auto byte = static_cast<unsigned char>(bytes[bytes.size() - back]);
+        if ((byte & 0xC0) == 0x80)
+            continue;
+        const std::size_t length = byte >= 0xF0 ? 4 : byte >= 0xE0 ? 3 : byte >= 0xC0 ? 2 : 1;
+        return length > back ? bytes.substr(0, bytes.size() - back) : bytes;
+    }
+    return bytes;
+}
+
 std::string withoutLongLines(const std::string& text, std::size_t maxLineBytes)
 {
     std::string cut;
     cut.reserve(text.size());
     for (std::size_t start = 0; start < text.size();) {
-        const auto found = text.find('\n', start);
+        const auto found = text.find_first_of("\r\n", start);
         const auto end = found == std::string::npos ? text.size() : found;
         const std::string_view line(text.data() + start, end - start);
         if (line.size() > maxLineBytes) {
@@ -94,7 +93,7 @@ std::string withoutLongLines(const std::string& text, std::size_t maxLineBytes)
             cut += line;
         }
         if (end < text.size())
-            cut += '\n';
+            cut += text[end];
         start = end + 1;
     }
     return cut;

@@ -19,6 +19,9 @@ namespace screens {
 /// characters are dropped.
 std::string decodedText(std::string_view bytes, TextEnd end, const TextDecoder& decoder);
 
+/// Answers UTF-8 without an incomplete character at its end.
+std::string_view withoutCutCharacter(std::string_view bytes);
+
 /// Answers the text with every longer line cut at a character, and an ellipsis in place of the rest.
 std::string withoutLongLines(const std::string& text, std::size_t maxLineBytes);
 

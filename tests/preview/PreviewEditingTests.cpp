@@ -210,6 +210,81 @@ TEST_F(PreviewEditingTest, LeavingSavesAndNeverReplacesWhatAnotherProgramWrote)
     EXPECT_EQ(preview->content()->pages->pageCount(), 1U) << "theirs is shown";
 }
 
+TEST_F(PreviewEditingTest, WhatIsChangedWhileItIsSavedIntoACopyIsInThatCopy)
+{
+    const auto loseFocus = [&] { drive.notifications->post(Notification::ApplicationDidLoseFocus); };
+    const auto press = [&](const char* title) {
+        const auto action = std::ranges::find(alert()->actions(), title, &kit::AlertAction::title);
+        alert()->press(*action);
+    };
+    const auto saveElsewhere = [&] {
+        ::chmod(item.path().c_str(), 0444);
+        loseFocus();
+        drive.dispatch->runUntilIdle();
+        press("Keep a Copy");
+        ::chmod(item.path().c_str(), 0644);
+    };
+    const auto done = [&] { preview->editor()->bar()->button(EditTool::Done)->press(); };
+    const auto end = [&] { drive.notifications->post(Notification::ApplicationWillTerminate); };
+    const struct {
+        const char* what;
+        std::function<void()> save, goOn;
+    } rows[] = {
+        {"another program has saved", loseFocus, [] {}},
+        {"the user is done meanwhile", loseFocus, done},
+        {"the program ends meanwhile", loseFocus, end},
+        {"a copy was asked for", saveElsewhere, [] {}},
+    };
+    const auto theirs = testing_support::simplePdf({"theirs"});
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.what);
+        fillIn("Ada");
+        drive.writeDocument("Form.pdf", theirs);
+        row.save();
+        ASSERT_TRUE(preview->editor());
+        EXPECT_TRUE(preview->editor()->fieldBar()->textField()->userEdited("Ada and Bob", {}));
+        row.goOn();
+        drive.dispatch->runUntilIdle();
+        EXPECT_EQ(contentOf(item), theirs);
+        EXPECT_EQ(written(drive.url("Form 2.pdf")), "Ada and Bob");
+        EXPECT_FALSE(fs::exists(drive.url("Form 3.pdf").path()));
+        ASSERT_TRUE(alert());
+        EXPECT_THAT(alert()->message(), HasSubstr("Form 2.pdf"));
+        answer("OK");
+        EXPECT_FALSE(alert()) << "it is said once";
+        leave();
+        fs::remove(drive.url("Form 2.pdf").path());
+    }
+}
+
+TEST_F(PreviewEditingTest, ACopyHasANameThatIsNotTooLong)
+{
+    std::string stem;
+    for (int i = 0; i < 125; ++i)
+        stem += "é";
+    show(formPdf(), (stem + ".pdf").c_str());
+    edit();
+    write("Ada");
+    drive.writeDocument(stem + ".pdf", "theirs");
+    leave();
+    EXPECT_EQ(written(drive.url(stem.substr(0, 248) + " 2.pdf")), "Ada");
+}
+
+TEST_F(PreviewEditingTest, UndoOfARefusedEditTakesBackNoOther)
+{
+    show(formPdf());
+    edit();
+    const auto editing = preview->editor()->editing();
+    const auto name = pages().fields().front();
+    const auto ignore = [](const auto&) {};
+    editing->apply(FieldTextEdit{0, name.id, "Ada"}, ignore);
+    editing->apply(MarkRemoval{0, 99}, ignore);
+    editing->undo(ignore);
+    drive.dispatch->runUntilIdle();
+    press(EditTool::Done);
+    EXPECT_EQ(written(item), "Ada");
+}
+
 TEST_F(PreviewEditingTest, HidesWhatIsWrittenInASecretField)
 {
     auto content = formPdf();

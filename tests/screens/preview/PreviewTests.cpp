@@ -155,6 +155,12 @@ TEST_F(Preview, CutsLongTextsAndSaysSo)
         limits);
     EXPECT_THAT(lines.text, testing::EndsWith("x…\nend"));
     EXPECT_THAT(lines.note, HasSubstr("very long lines"));
+    for (const auto& [file, lineEnd] : {std::pair("Mac.txt", "\r"), {"Windows.txt", "\r\n"}}) {
+        std::string many;
+        while (many.size() <= limits.maxLineBytes)
+            many += std::string("line") + lineEnd;
+        EXPECT_EQ(loadPreview(drive.writeDocument(file, many), limits).text, many);
+    }
 
     open(drive.url("Long.txt"));
     screen->view()->layoutIfNeeded();
