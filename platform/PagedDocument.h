@@ -25,7 +25,7 @@ inline constexpr std::string_view pages = "app.tarrow.Drive.pages"; ///< codes: 
 enum class PagesErrorCode : int {
     Damaged = 1, ///< the content is no such document, or it has no pages
     PasswordRequired = 2, ///< the document is encrypted
-    TooLarge = 3, ///< a page is asked for in more pixels than PagedDocument::maxRenderedPixels
+    TooLarge = 3, ///< a page is asked for in more pixels than PagedDocument allows
     Refused = 4, ///< the document does not allow the change, or does not have what is to be changed
 };
 
@@ -63,6 +63,7 @@ class PagedDocument {
 public:
     /// The most pixels that one picture of a page may have: 128 MiB.
     static constexpr int maxRenderedPixels = 32 << 20;
+    static constexpr int longestRenderedSide = 32'767; ///< pixels
 
     virtual ~PagedDocument() = default;
 

@@ -186,7 +186,8 @@ Result<Image> PopplerPages::renderPage(std::size_t index, double pixelsPerPoint,
 {
     const int width = static_cast<int>(std::lround(part.width * pixelsPerPoint));
     const int height = static_cast<int>(std::lround(part.height * pixelsPerPoint));
-    if (width <= 0 || height <= 0 || width > maxRenderedPixels / height)
+    if (width <= 0 || height <= 0 || width > maxRenderedPixels / height
+        || std::max(width, height) > longestRenderedSide)
         return pagesError(PagesErrorCode::TooLarge);
     return withDocument([&](PopplerDocument& document) -> Result<Image> {
         const auto drawn = page(document, index);

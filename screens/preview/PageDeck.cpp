@@ -132,7 +132,8 @@ Rect PageDeck::toContent(std::size_t page, const Rect& onPage) const
 double PageDeck::wantedPixelsPerPoint(std::size_t page) const
 {
     const auto& size = _pages[page];
-    return std::min(fullPixelsPerPoint(), std::sqrt(maxPagePixels / (size.width * size.height)));
+    return std::min({fullPixelsPerPoint(), std::sqrt(maxPagePixels / (size.width * size.height)),
+        longestPictureSide / std::max(size.width, size.height)});
 }
 
 std::optional<PageDeck::Task> PageDeck::nextTask(const Rect& visible) const

@@ -22,6 +22,8 @@ public:
     static constexpr double gap = 12; ///< between pages and around them, content points at a zoom of 1
     static constexpr double widestFit = 900; ///< a page is not made wider than this to fit
     static constexpr double maxPagePixels = 6e6; ///< a picture of a whole page has no more
+    /// No side of a picture of a whole page is longer, because graphics hardware takes no longer one.
+    static constexpr double longestPictureSide = 16'000;
     static constexpr std::size_t maxPictureBytes = 64 << 20; ///< the limit for all kept pictures together
 
     void setPages(

@@ -58,6 +58,20 @@ TEST(PageDeckTest, PlacesPagesBelowEachOtherAndGrowsWithTheZoom)
     EXPECT_EQ(deckOf(3).currentPage({0, 300, 224, 300}), 1U);
 }
 
+TEST(PageDeckTest, DrawsAVeryLongPageCoarselyAndWhatIsSeenOfItFinely)
+{
+    auto deck = deckOf(1, {50, 14'400});
+    const Rect seen{0, 1000, 224, 400};
+    const auto whole = deck.nextTask(seen);
+    ASSERT_TRUE(whole && !whole->isDetail);
+    EXPECT_LE(whole->part.height * whole->pixelsPerPoint, PageDeck::longestPictureSide);
+    EXPECT_LE(PageDeck::longestPictureSide, PagedDocument::longestRenderedSide);
+    deck.finish(*whole, drawn(*whole), seen);
+    const auto detail = deck.nextTask(seen);
+    ASSERT_TRUE(detail && detail->isDetail);
+    EXPECT_EQ(detail->pixelsPerPoint, 4);
+}
+
 TEST(PageDeckTest, DrawsWhatIsSeenFirstAndThenItsNeighbours)
 {
     auto deck = deckOf(10);
@@ -246,6 +260,9 @@ TEST_F(Pages, DrawsNoMorePixelsThanItsLimitAllows)
     EXPECT_EQ(document->renderPage(0, 1000, {0, 0, 200, 300}).error->code(),
         static_cast<int>(PagesErrorCode::TooLarge));
     EXPECT_EQ(document->renderPage(0, 0.5, {0, 0, 200, 300}).value->pixelHeight(), 150);
+    EXPECT_EQ(document->renderPage(0, 10, {0, 0, 1, 3277}).error->code(),
+        static_cast<int>(PagesErrorCode::TooLarge))
+        << "it would be blank";
 }
 
 } // namespace
