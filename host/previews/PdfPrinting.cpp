@@ -4,6 +4,7 @@
 #include "host/previews/PdfPrinting.h"
 
 #include "host/gtk/base/ObjectRef.h"
+#include "host/previews/PopplerPages.h"
 #include "host/system/texts/Translate.h"
 
 #include <poppler.h>
@@ -25,19 +26,17 @@ public:
         : _document(std::move(document))
     {
     }
-    int paginate(GtkPrintContext*) override
+    int paginate(platform::Size) override
     {
         return std::max(1, poppler_document_get_n_pages(_document.get()));
     }
-    void draw(GtkPrintContext* paper, int page) override
+    void draw(cairo_t* cairo, platform::Size paper, int page) override
     {
         const auto content = ObjectRef<PopplerPage>::adopt(poppler_document_get_page(_document.get(), page));
         if (!content)
             return;
-        double width = 0, height = 0;
-        poppler_page_get_size(content.get(), &width, &height);
-        gtk::fitOnPaper(paper, width, height, 1);
-        poppler_page_render_for_printing(content.get(), gtk_print_context_get_cairo_context(paper));
+        gtk::fitOnPaper(cairo, paper, PopplerPages::sizeOf(content.get()), 1);
+        poppler_page_render_for_printing(content.get(), cairo);
     }
 
 private:

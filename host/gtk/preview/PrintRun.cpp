@@ -5,7 +5,11 @@
 
 #include "host/gtk/base/ObjectRef.h"
 #include "host/system/texts/Translate.h"
+#include "platform/Dispatch.h"
+#include "platform/Services.h"
 
+#include <chrono>
+#include <future>
 #include <utility>
 
 namespace host::gtk {
@@ -18,7 +22,14 @@ using Ended = std::function<void(std::optional<platform::Error>)>;
 struct PrintRun {
     std::shared_ptr<PrintablePages> pages;
     Ended ended;
+    std::shared_ptr<platform::Queue> queue; ///< lays the pages out and draws them
+    std::future<int> count; ///< of the pages, once the layout has begun
 };
+
+platform::Size sizeOf(GtkPrintContext* paper)
+{
+    return {gtk_print_context_get_width(paper), gtk_print_context_get_height(paper)};
+}
 
 platform::Error printError(const GError* error)
 {
@@ -29,14 +40,37 @@ platform::Error printError(const GError* error)
                 std::string(error ? error->message : "")}}};
 }
 
-void beginPrint(GtkPrintOperation* operation, GtkPrintContext* paper, gpointer data)
+/// Answers TRUE when the number of pages is known. The toolkit asks again and again until then, so each call
+/// waits a little.
+gboolean paginate(GtkPrintOperation* operation, GtkPrintContext* paper, gpointer data)
 {
-    gtk_print_operation_set_n_pages(operation, static_cast<PrintRun*>(data)->pages->paginate(paper));
+    constexpr auto turn = std::chrono::milliseconds(4);
+    auto* run = static_cast<PrintRun*>(data);
+    if (!run->count.valid()) {
+        const auto count = std::make_shared<std::promise<int>>();
+        run->count = count->get_future();
+        run->queue->async(
+            [pages = run->pages, size = sizeOf(paper), count] { count->set_value(pages->paginate(size)); });
+    }
+    if (run->count.wait_for(turn) != std::future_status::ready)
+        return FALSE;
+    gtk_print_operation_set_n_pages(operation, run->count.get());
+    return TRUE;
 }
 
-void drawPage(GtkPrintOperation*, GtkPrintContext* paper, int page, gpointer data)
+/// Draws a page on the queue. The toolkit goes on with the next one when it is told of the end.
+void drawPage(GtkPrintOperation* operation, GtkPrintContext* paper, int page, gpointer data)
 {
-    static_cast<PrintRun*>(data)->pages->draw(paper, page);
+    const auto* run = static_cast<PrintRun*>(data);
+    gtk_print_operation_set_defer_drawing(operation);
+    run->queue->async([pages = run->pages, cairo = gtk_print_context_get_cairo_context(paper),
+                          size = sizeOf(paper), page, main = platform::services().dispatch().mainQueue(),
+                          operation = ObjectRef<GtkPrintOperation>::retain(operation)]() mutable {
+        pages->draw(cairo, size, page);
+        // The operation ends on the main thread, because its window does.
+        main->async(
+            [operation = std::move(operation)] { gtk_print_operation_draw_page_finish(operation.get()); });
+    });
 }
 
 void done(GtkPrintOperation* operation, GtkPrintOperationResult result, gpointer data)
@@ -56,7 +90,7 @@ void connect(GtkPrintOperation* operation, PrintRun* run)
     // The operation deletes the run when it is destroyed.
     g_object_set_data_full(
         G_OBJECT(operation), "print-run", run, [](gpointer data) { delete static_cast<PrintRun*>(data); });
-    g_signal_connect(operation, "begin-print", G_CALLBACK(beginPrint), run);
+    g_signal_connect(operation, "paginate", G_CALLBACK(paginate), run);
     g_signal_connect(operation, "draw-page", G_CALLBACK(drawPage), run);
     g_signal_connect(operation, "done", G_CALLBACK(done), run);
 }
@@ -67,7 +101,8 @@ void startPrinting(
     std::shared_ptr<PrintablePages> pages, const std::string& name, const PrintTarget& target, Ended ended)
 {
     const auto operation = ObjectRef<GtkPrintOperation>::adopt(gtk_print_operation_new());
-    auto run = std::make_unique<PrintRun>(PrintRun{std::move(pages), std::move(ended)});
+    auto run = std::make_unique<PrintRun>(PrintRun{std::move(pages), std::move(ended),
+        platform::services().dispatch().makeSerialQueue("printed pages"), {}});
     connect(operation.get(), run.release());
     gtk_print_operation_set_job_name(operation.get(), name.c_str());
     gtk_print_operation_set_unit(operation.get(), GTK_UNIT_POINTS);

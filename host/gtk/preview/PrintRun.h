@@ -5,6 +5,8 @@
 
 #include "host/gtk/preview/PrintablePages.h"
 
+#include <gtk/gtk.h>
+
 #include <functional>
 #include <memory>
 #include <optional>
@@ -18,8 +20,8 @@ struct PrintTarget {
     std::string file{}; ///< empty: show the dialog
 };
 
-/// Prints pages under a name. `ended` is called once, with the error, or with nothing when the pages were
-/// printed or the user cancelled. Main thread.
+/// Prints pages under a name. They are laid out and drawn off the main thread. `ended` is called once, with
+/// the error, or with nothing when the pages were printed or the user cancelled. Main thread.
 void startPrinting(std::shared_ptr<PrintablePages> pages, const std::string& name, const PrintTarget& target,
     std::function<void(std::optional<platform::Error>)> ended);
 

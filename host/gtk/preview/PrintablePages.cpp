@@ -3,16 +3,22 @@
 
 #include "host/gtk/preview/PrintablePages.h"
 
+#include "host/gtk/base/ImagePaint.h"
 #include "host/gtk/base/ObjectRef.h"
 #include "host/gtk/preview/PreviewModule.h"
 #include "host/system/texts/Translate.h"
+#include "platform/ImageLoader.h"
+#include "platform/Services.h"
+#include "screens/ErrorWords.h"
 #include "screens/preview/TextDecoding.h"
 
-#include <gdk-pixbuf/gdk-pixbuf.h>
 #include <glib/gstdio.h>
+#include <pango/pangocairo.h>
 
 #include <algorithm>
 #include <cerrno>
+#include <compare>
+#include <string_view>
 #include <vector>
 
 namespace host::gtk {
@@ -20,7 +26,9 @@ namespace host::gtk {
 using host::system::textKey;
 using host::system::translated;
 using platform::Error;
+using platform::Image;
 using platform::Result;
+using platform::Size;
 
 namespace {
 
@@ -28,86 +36,125 @@ using Pages = std::shared_ptr<PrintablePages>;
 
 constexpr int pictureSide = 4000; ///< pixels: A4 at 340 dots to an inch
 constexpr gsize longestText = 4U << 20U; ///< bytes, some 1500 pages
+/// A longer paragraph is laid out in parts, because the layout of all of it would take much memory.
+constexpr std::size_t longestParagraph = 16U << 10U; // bytes
 constexpr auto textFont = "Monospace 9";
 
 class PicturePage : public PrintablePages {
 public:
-    explicit PicturePage(ObjectRef<GdkPixbuf> picture)
+    explicit PicturePage(Image picture)
         : _picture(std::move(picture))
     {
     }
-    int paginate(GtkPrintContext*) override { return 1; }
-    void draw(GtkPrintContext* paper, int) override
+    int paginate(Size) override { return 1; }
+    void draw(cairo_t* cairo, Size paper, int) override
     {
         constexpr double pointsOfPixel = 72.0 / 96;
-        fitOnPaper(paper, gdk_pixbuf_get_width(_picture.get()), gdk_pixbuf_get_height(_picture.get()),
-            pointsOfPixel * 2);
-        auto* cairo = gtk_print_context_get_cairo_context(paper);
-        gdk_cairo_set_source_pixbuf(cairo, _picture.get(), 0, 0);
-        cairo_paint(cairo);
+        fitOnPaper(cairo, paper, _picture.size(), pointsOfPixel * 2);
+        ImagePaint::draw(cairo, _picture, {0, 0, _picture.size().width, _picture.size().height});
     }
 
 private:
-    ObjectRef<GdkPixbuf> _picture;
+    Image _picture;
 };
 
+/// A text whose paragraphs are laid out one by one.
 class TextPages : public PrintablePages {
 public:
     explicit TextPages(std::string text)
         : _text(std::move(text))
+        , _context(ObjectRef<PangoContext>::adopt(makeContext()))
     {
     }
-    int paginate(GtkPrintContext* paper) override
+    int paginate(Size paper) override
     {
-        makeLayout(paper);
-        const double height = gtk_print_context_get_height(paper) * PANGO_SCALE;
-        _starts = {0};
+        _pages = {Page()};
         double used = 0;
-        for (int line = 0; line < pango_layout_get_line_count(_layout.get()); ++line) {
-            PangoRectangle extents;
-            pango_layout_line_get_extents(
-                pango_layout_get_line_readonly(_layout.get(), line), nullptr, &extents);
-            if (used + extents.height > height && line > _starts.back()) {
-                _starts.push_back(line);
-                used = 0;
+        for (std::size_t start = 0; start < _text.size(); start = paragraphAt(start).next) {
+            const auto layout = layOut(start, paper);
+            for (int line = 0; line < pango_layout_get_line_count(layout.get()); ++line) {
+                const double height = extentsOf(layout.get(), line).height;
+                if (used + height > paper.height * PANGO_SCALE && used > 0) {
+                    _pages.push_back({start, line});
+                    used = 0;
+                }
+                used += height;
             }
-            used += extents.height;
         }
-        return static_cast<int>(_starts.size());
+        return static_cast<int>(_pages.size());
     }
-    void draw(GtkPrintContext* paper, int page) override
+    void draw(cairo_t* cairo, Size paper, int page) override
     {
-        auto* cairo = gtk_print_context_get_cairo_context(paper);
         const auto index = static_cast<std::size_t>(page);
-        const int end =
-            index + 1 < _starts.size() ? _starts[index + 1] : pango_layout_get_line_count(_layout.get());
+        const auto end = index + 1 < _pages.size() ? _pages[index + 1] : Page{_text.size(), 0};
         double y = 0;
-        for (int line = _starts[index]; line < end; ++line) {
-            auto* laidOut = pango_layout_get_line_readonly(_layout.get(), line);
-            PangoRectangle extents;
-            pango_layout_line_get_extents(laidOut, nullptr, &extents);
-            cairo_move_to(cairo, 0, (y - extents.y) / PANGO_SCALE);
-            pango_cairo_show_layout_line(cairo, laidOut);
-            y += extents.height;
+        auto [start, line] = _pages[index];
+        for (; start < _text.size() && Page{start, line} < end; start = paragraphAt(start).next, line = 0) {
+            const auto layout = layOut(start, paper);
+            const int last = start == end.paragraph ? end.line : pango_layout_get_line_count(layout.get());
+            for (; line < last; ++line) {
+                const auto extents = extentsOf(layout.get(), line);
+                cairo_move_to(cairo, 0, (y - extents.y) / PANGO_SCALE);
+                pango_cairo_show_layout_line(cairo, pango_layout_get_line_readonly(layout.get(), line));
+                y += extents.height;
+            }
         }
     }
 
 private:
-    void makeLayout(GtkPrintContext* paper)
+    /// The place where a page begins.
+    struct Page {
+        std::size_t paragraph = 0; ///< byte of the text
+        int line = 0; ///< of that paragraph
+        auto operator<=>(const Page&) const = default;
+    };
+    struct Paragraph {
+        std::string_view words;
+        std::size_t next; ///< where the next paragraph begins
+    };
+
+    /// The threads that print take turns, so the fonts belong to none of them.
+    static PangoContext* makeContext()
     {
-        _layout = ObjectRef<PangoLayout>::adopt(gtk_print_context_create_pango_layout(paper));
+        constexpr double pointsToAnInch = 72;
+        const auto fonts = ObjectRef<PangoFontMap>::adopt(pango_cairo_font_map_new());
+        auto* context = pango_font_map_create_context(fonts.get());
+        pango_cairo_context_set_resolution(context, pointsToAnInch);
+        return context;
+    }
+    static PangoRectangle extentsOf(PangoLayout* layout, int line)
+    {
+        PangoRectangle extents;
+        pango_layout_line_get_extents(pango_layout_get_line_readonly(layout, line), nullptr, &extents);
+        return extents;
+    }
+    Paragraph paragraphAt(std::size_t start) const
+    {
+        const auto rest = std::string_view(_text).substr(start, longestParagraph);
+        const auto lineEnd = rest.find_first_of("\r\n");
+        if (lineEnd == std::string_view::npos) {
+            const auto words = start + rest.size() < _text.size() ? screens::withoutCutCharacter(rest) : rest;
+            return {words, start + words.size()};
+        }
+        const bool isPair = std::string_view(_text).substr(start + lineEnd, 2) == "\r\n";
+        return {rest.substr(0, lineEnd), start + lineEnd + (isPair ? 2 : 1)};
+    }
+    ObjectRef<PangoLayout> layOut(std::size_t start, Size paper) const
+    {
+        const auto words = paragraphAt(start).words;
+        auto layout = ObjectRef<PangoLayout>::adopt(pango_layout_new(_context.get()));
         const std::unique_ptr<PangoFontDescription, decltype(&pango_font_description_free)> font(
             pango_font_description_from_string(textFont), pango_font_description_free);
-        pango_layout_set_font_description(_layout.get(), font.get());
-        pango_layout_set_width(
-            _layout.get(), static_cast<int>(gtk_print_context_get_width(paper) * PANGO_SCALE));
-        pango_layout_set_wrap(_layout.get(), PANGO_WRAP_WORD_CHAR);
-        pango_layout_set_text(_layout.get(), _text.data(), static_cast<int>(_text.size()));
+        pango_layout_set_font_description(layout.get(), font.get());
+        pango_layout_set_width(layout.get(), static_cast<int>(paper.width * PANGO_SCALE));
+        pango_layout_set_wrap(layout.get(), PANGO_WRAP_WORD_CHAR);
+        pango_layout_set_text(layout.get(), words.data(), static_cast<int>(words.size()));
+        return layout;
     }
 
     std::string _text;
-    ObjectRef<PangoLayout> _layout;
-    std::vector<int> _starts; ///< the first line of each page
+    ObjectRef<PangoContext> _context;
+    std::vector<Page> _pages;
 };
 
 Result<Pages> readPdf(const std::string& path, const PreviewModule& previews)
@@ -119,17 +166,12 @@ Result<Pages> readPdf(const std::string& path, const PreviewModule& previews)
 
 Result<Pages> readPicture(const std::string& path)
 {
-    GError* error = nullptr;
-    int width = 0, height = 0;
-    gdk_pixbuf_get_file_info(path.c_str(), &width, &height);
-    auto* picture = std::max(width, height) > pictureSide
-        ? gdk_pixbuf_new_from_file_at_scale(path.c_str(), pictureSide, pictureSide, TRUE, &error)
-        : gdk_pixbuf_new_from_file(path.c_str(), &error);
+    const auto picture =
+        platform::services().imageLoader().load(path, {.maxWidth = pictureSide, .maxHeight = pictureSide});
     if (!picture)
-        return printingError(textKey("The picture is damaged."), error);
-    const auto raw = ObjectRef<GdkPixbuf>::adopt(picture);
-    return Pages(std::make_shared<PicturePage>(
-        ObjectRef<GdkPixbuf>::adopt(gdk_pixbuf_apply_embedded_orientation(raw.get()))));
+        return Error(picture.error->domain(), picture.error->code(),
+            {{std::string(platform::errorKey::localizedDescription), screens::errorWords(*picture.error)}});
+    return Pages(std::make_shared<PicturePage>(*picture.value));
 }
 
 Result<Pages> readText(const std::string& path, const PreviewModule& previews)
@@ -150,13 +192,11 @@ Result<Pages> readText(const std::string& path, const PreviewModule& previews)
 
 } // namespace
 
-void fitOnPaper(GtkPrintContext* paper, double width, double height, double largest)
+void fitOnPaper(cairo_t* cairo, Size paper, Size content, double largest)
 {
-    auto* cairo = gtk_print_context_get_cairo_context(paper);
-    const double paperWidth = gtk_print_context_get_width(paper);
-    const double paperHeight = gtk_print_context_get_height(paper);
-    const double scale = std::min({paperWidth / width, paperHeight / height, largest});
-    cairo_translate(cairo, (paperWidth - width * scale) / 2, (paperHeight - height * scale) / 2);
+    const double scale = std::min({paper.width / content.width, paper.height / content.height, largest});
+    cairo_translate(
+        cairo, (paper.width - content.width * scale) / 2, (paper.height - content.height * scale) / 2);
     cairo_scale(cairo, scale, scale);
 }
 
