@@ -16,6 +16,7 @@
 #include "host/system/desktop/JournalLogSink.h"
 #include "host/system/desktop/MimeTypeRegistry.h"
 #include "host/system/desktop/TypePreviewSupport.h"
+#include "host/system/drawing/CairoImageContext.h"
 #include "host/system/files/JsonKeyedArchiver.h"
 #include "host/system/files/JsonUserDefaults.h"
 #include "host/system/files/PosixFileSystem.h"
@@ -27,6 +28,7 @@
 #include "host/system/texts/UnicodeCharacterData.h"
 #include "host/system/texts/UserLocale.h"
 #include "items/FileUtils.h"
+#include "kit/values/ImageContext.h"
 #include "platform/Log.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Services.h"
@@ -145,6 +147,7 @@ int main(int argc, char** argv)
     // destroyed.
     const auto dispatch = set.dispatch;
     platform::installServices(std::move(set));
+    kit::ImageContext::install(host::system::openImageContext);
     tarrow::FileUtils::logFileAttributes(executable);
 
     auto application = host::gtk::makeApplication({.version = TRW_VERSION,

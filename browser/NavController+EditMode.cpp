@@ -206,15 +206,10 @@ std::string NavController::quotaAvailableString() const
     return platform::localizedPlural(".DICT.AVAILABLE.%g", {number, text});
 }
 
-std::vector<platform::Color> NavController::documentListControllerColorsForTagNames(
+std::vector<kit::TagDot> NavController::documentListControllerDotsForTagNames(
     const List&, const std::vector<std::string>& names)
 {
-    std::vector<platform::Color> dots;
-    for (const auto& name : names) {
-        if (const auto color = FileTags::colorOfTag(name))
-            dots.push_back(*color);
-    }
-    return dots;
+    return FileTags::dotsForTags(names);
 }
 
 } // namespace tarrow

@@ -166,7 +166,7 @@ public:
         const Completion& completion) override;
     void documentListControllerPerformActionURL(
         const List& list, int action, const platform::Url& url) override;
-    std::vector<platform::Color> documentListControllerColorsForTagNames(
+    std::vector<kit::TagDot> documentListControllerDotsForTagNames(
         const List& list, const std::vector<std::string>& names) override;
 
     // These act on items. Every change runs on the queue that all changes share, see ItemChange.

@@ -34,6 +34,9 @@ struct Tags {
 /// new table.
 class Current {
 public:
+    /// Readings take turns, so that the table of an earlier one never replaces that of a later one.
+    std::mutex reading;
+
     std::shared_ptr<const Tags> tags() const
     {
         const std::lock_guard lock(_mutex);
@@ -128,6 +131,7 @@ std::vector<std::string> FileTags::allTags()
 void FileTags::_tagColorsDidChange()
 {
     static constexpr Operation op{"+[FileTags _tagColorsDidChange]"};
+    const std::lock_guard lock(current().reading);
     const auto stored = services().keyValueStore().objectForKey(tableKey);
     const auto* table = stored ? stored->get<PropertyDictionary>() : nullptr;
     if (const auto version = table ? unsignedUnder(*table, versionKey) : tableVersion;

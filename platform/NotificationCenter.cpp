@@ -4,6 +4,7 @@
 #include "platform/NotificationCenter.h"
 
 #include <algorithm>
+#include <mutex>
 #include <vector>
 
 namespace platform {
@@ -13,6 +14,7 @@ struct NotificationCenter::Registry {
         Notification notification;
         Observer observer;
     };
+    std::mutex mutex;
     std::vector<std::weak_ptr<Entry>> entries;
 };
 
@@ -26,6 +28,7 @@ NotificationCenter::~NotificationCenter() = default;
 Observation NotificationCenter::observe(Notification notification, Observer observer)
 {
     auto entry = std::make_shared<Registry::Entry>(Registry::Entry{notification, std::move(observer)});
+    const std::lock_guard lock(_registry->mutex);
     std::erase_if(_registry->entries, [](const auto& known) { return known.expired(); });
     _registry->entries.push_back(entry);
     return Observation(std::move(entry));
@@ -34,7 +37,10 @@ Observation NotificationCenter::observe(Notification notification, Observer obse
 void NotificationCenter::post(Notification notification, const PropertyDictionary& userInfo)
 {
     // A copy, because an observer may register or drop others; one that was dropped meanwhile is not called.
-    const auto entries = _registry->entries;
+    const auto entries = [this] {
+        const std::lock_guard lock(_registry->mutex);
+        return _registry->entries;
+    }();
     for (const auto& known : entries) {
         const auto entry = known.lock();
         if (entry && entry->notification == notification)

@@ -42,8 +42,9 @@ private:
     std::shared_ptr<void> _registration;
 };
 
-/// Tells observers of notices, in the order in which they registered. It is used on the main thread alone:
-/// observers register there, notices are posted there, and observers are called there, before post() returns.
+/// Tells observers of notices, in the order in which they registered. Notices are posted on the main thread
+/// alone, and observers are called there, before post() returns. Any thread may register an observer, because
+/// what needs the first notice may be asked for first anywhere.
 class NotificationCenter {
 public:
     using Observer = std::function<void(const PropertyDictionary& userInfo)>;

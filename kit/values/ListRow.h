@@ -4,7 +4,7 @@
 #pragma once
 
 #include "kit/values/PlatformNames.h"
-#include "platform/Color.h"
+#include "kit/values/TagDots.h"
 #include "platform/Image.h"
 
 #include <cstdint>
@@ -32,7 +32,7 @@ struct ListRow {
     std::string detail; ///< second line; empty: none
     RowAccessory accessory = RowAccessory::None;
     CheckState check = CheckState::None; ///< the list sets it by its selection
-    std::vector<Color> tagColors; ///< dots beside the title, in this order
+    std::vector<TagDot> tagDots; ///< beside the title, in this order
     DownloadState download = DownloadState::Present;
     double downloadProgress = 0; ///< 0 to 1, while Downloading
     bool isDimmed = false;

@@ -76,13 +76,13 @@ void DocumentListController::setDelegate(std::weak_ptr<DocumentListControllerDel
     _delegate = std::move(delegate);
     if (!_rows)
         return;
-    _rows->setTagColors(weaklyOr(std::vector<Color>(), this, &DocumentListController::colorsForTags));
+    _rows->setTagDots(weaklyOr(std::vector<kit::TagDot>(), this, &DocumentListController::dotsForTags));
 }
 
-std::vector<Color> DocumentListController::colorsForTags(const std::vector<std::string>& names)
+std::vector<kit::TagDot> DocumentListController::dotsForTags(const std::vector<std::string>& names)
 {
-    const auto colors = delegate();
-    return colors ? colors->documentListControllerColorsForTagNames(self(), names) : std::vector<Color>();
+    const auto dots = delegate();
+    return dots ? dots->documentListControllerDotsForTagNames(self(), names) : std::vector<kit::TagDot>();
 }
 
 void DocumentListController::loadView()

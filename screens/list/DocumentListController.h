@@ -140,7 +140,7 @@ private:
     void takeKeyboard();
     void followLibraries();
     void librariesMayHaveChanged();
-    std::vector<Color> colorsForTags(const std::vector<std::string>& names);
+    std::vector<kit::TagDot> dotsForTags(const std::vector<std::string>& names);
     void showLoadingAfterDelay();
     void reportRemovalIfShown();
     void open(const Url& url, FolderEntryKind kind);

@@ -7,10 +7,10 @@
 
 namespace screens {
 
-std::vector<Color> DocumentListControllerDelegate::documentListControllerColorsForTagNames(
+std::vector<kit::TagDot> DocumentListControllerDelegate::documentListControllerDotsForTagNames(
     const List&, const std::vector<std::string>& names)
 {
-    return std::vector<Color>(names.size(), kit::StandardColors::gray);
+    return {names.size(), {kit::StandardColors::gray, kit::StandardColors::lightGray}};
 }
 
 } // namespace screens

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "platform/Color.h"
+#include "kit/values/TagDots.h"
 #include "platform/Url.h"
 #include "screens/PlatformNames.h"
 
@@ -64,8 +64,9 @@ public:
     /// An older form, for a delegate that needs neither the view nor the completion.
     virtual void documentListControllerPerformActionURL(const List&, int /*action*/, const Url&) { }
 
-    /// Answers the dots for an item's tags, one for each name that has a colour.
-    virtual std::vector<Color> documentListControllerColorsForTagNames(
+    /// Answers the dots for an item's tags, one for each name. It is asked again when the key-value store,
+    /// which has the tags' colours, has changed.
+    virtual std::vector<kit::TagDot> documentListControllerDotsForTagNames(
         const List& list, const std::vector<std::string>& names);
 };
 

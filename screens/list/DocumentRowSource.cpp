@@ -13,6 +13,7 @@
 #include "screens/DisplayName.h"
 #include "screens/list/RowThumbnail.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace screens {
@@ -56,6 +57,7 @@ std::shared_ptr<DocumentRowSource> DocumentRowSource::create(const std::shared_p
         [](const RowRequest& request) { return readRowThumbnail(request.url); },
         weakly(source, &DocumentRowSource::thumbnailArrived));
     source->followDownloads();
+    source->followTagTable();
     return source;
 }
 
@@ -111,8 +113,8 @@ void DocumentRowSource::complete(kit::ListRow& row, const RowDetails& details) c
     row.detail = details.text;
     if (row.download == kit::DownloadState::Present)
         row.download = details.download;
-    if (_tagColors && !details.tagNames.empty())
-        row.tagColors = _tagColors(details.tagNames);
+    if (_tagDots && !details.tagNames.empty())
+        row.tagDots = _tagDots(details.tagNames);
 }
 
 void DocumentRowSource::followDownloads()
@@ -123,6 +125,30 @@ void DocumentRowSource::followDownloads()
             if (self._rows && url != userInfo.end())
                 self.tellIfVisible(self._rows->idFor(*url->second.get<Url>()));
         }));
+}
+
+void DocumentRowSource::followTagTable()
+{
+    // The rows are told a turn later, because those who answer the dots may hear of the change after this.
+    _onTagTable = services().notificationCenter().observe(Notification::KeyValueStoreDidChangeExternally,
+        weakly(this, [](DocumentRowSource& self, const PropertyDictionary&) {
+            services().dispatch().mainQueue()->async(weakly(&self, &DocumentRowSource::tagTableDidChange));
+        }));
+}
+
+void DocumentRowSource::tagTableDidChange() const
+{
+    const auto list = _list.lock();
+    const bool haveTags =
+        std::ranges::any_of(_known, [](const auto& known) { return !known.second.details.tagNames.empty(); });
+    if (!list || !_rows || !haveTags)
+        return;
+    // Invisible rows are told, too, because a window may keep them filled.
+    for (std::size_t row = 0; row < _rows->count(); ++row) {
+        const auto known = _known.find(_rows->ids()[row]);
+        if (known != _known.end() && !known->second.details.tagNames.empty())
+            list->rowChanged(row);
+    }
 }
 
 void DocumentRowSource::showDownload(kit::ListRow& row, std::size_t index) const

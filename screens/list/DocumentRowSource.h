@@ -4,7 +4,6 @@
 #pragma once
 
 #include "kit/views/ListViewDataSource.h"
-#include "platform/Color.h"
 #include "platform/NotificationCenter.h"
 #include "screens/PlatformNames.h"
 #include "screens/list/DocumentRows.h"
@@ -29,7 +28,7 @@ class DocumentRowSource : public kit::ListViewDataSource,
                           public std::enable_shared_from_this<DocumentRowSource> {
 public:
     /// Answers the dots for tags. Called on the main thread for rows that are about to be seen.
-    using TagColors = std::function<std::vector<Color>(const std::vector<std::string>& names)>;
+    using TagDots = std::function<std::vector<kit::TagDot>(const std::vector<std::string>& names)>;
 
     /// Details of so many rows are kept. Beyond that, those of invisible rows are dropped.
     static constexpr std::size_t keptDetails = 600;
@@ -40,7 +39,7 @@ public:
     const std::shared_ptr<const DocumentRows>& rows() const { return _rows; }
     /// Sets the rows. The caller tells the list the difference.
     void setRows(std::shared_ptr<const DocumentRows> rows) { _rows = std::move(rows); }
-    void setTagColors(TagColors tagColors) { _tagColors = std::move(tagColors); }
+    void setTagDots(TagDots tagDots) { _tagDots = std::move(tagDots); }
 
     /// Answers the place of an item, which its row shows before the details; none at first. Called on the
     /// main thread for rows that are about to be seen.
@@ -80,6 +79,8 @@ private:
     void fetchThumbnails();
     void tellIfVisible(kit::RowId id) const;
     void followDownloads();
+    void followTagTable();
+    void tagTableDidChange() const;
     void showDownload(kit::ListRow& row, std::size_t index) const;
     void forgetDetailsOutside(const kit::RowRange& range);
     void complete(kit::ListRow& row, const RowDetails& details) const;
@@ -92,8 +93,8 @@ private:
     std::shared_ptr<const DocumentRows> _rows;
     std::shared_ptr<Loader> _loader;
     std::shared_ptr<ThumbnailLoader> _thumbnails;
-    Observation _onDownloads;
-    TagColors _tagColors;
+    Observation _onDownloads, _onTagTable;
+    TagDots _tagDots;
     Places _places;
     std::unordered_map<kit::RowId, Known> _known;
     mutable std::unordered_map<std::string, std::string> _iconsByExtension, _kindsByExtension;

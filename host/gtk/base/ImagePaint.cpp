@@ -3,6 +3,8 @@
 
 #include "host/gtk/base/ImagePaint.h"
 
+#include "host/system/drawing/CairoCanvas.h"
+
 #include <algorithm>
 #include <memory>
 
@@ -20,22 +22,6 @@ ObjectRef<GtkIconPaintable> lookUp(
     return ObjectRef<GtkIconPaintable>::adopt(
         gtk_icon_theme_lookup_icon(gtk_icon_theme_get_for_display(display), name.c_str(), nullptr,
             std::max(size, smallestIcon), scale, direction, static_cast<GtkIconLookupFlags>(0)));
-}
-
-void drawPixels(cairo_t* cairo, const Image& image, const platform::Rect& rect, cairo_filter_t filter)
-{
-    // The cast is safe, because Cairo only reads a surface that is used as a source.
-    auto* pixels = reinterpret_cast<unsigned char*>(const_cast<std::uint32_t*>(image.pixels().data()));
-    auto* surface = cairo_image_surface_create_for_data(
-        pixels, CAIRO_FORMAT_ARGB32, image.pixelWidth(), image.pixelHeight(), image.pixelWidth() * 4);
-    cairo_save(cairo);
-    cairo_translate(cairo, rect.x, rect.y);
-    cairo_scale(cairo, rect.width / image.pixelWidth(), rect.height / image.pixelHeight());
-    cairo_set_source_surface(cairo, surface, 0, 0);
-    cairo_pattern_set_filter(cairo_get_source(cairo), filter);
-    cairo_paint(cairo);
-    cairo_restore(cairo);
-    cairo_surface_destroy(surface);
 }
 
 void drawIcon(cairo_t* cairo, const Image& image, const platform::Rect& rect)
@@ -95,8 +81,8 @@ void draw(cairo_t* cairo, const Image& image, const platform::Rect& rect, cairo_
         return;
     if (image.isNamed())
         drawIcon(cairo, image, rect);
-    else if (!image.pixels().empty())
-        drawPixels(cairo, image, rect, filter);
+    else
+        system::CairoCanvas::drawPixels(cairo, image, rect, filter);
 }
 
 } // namespace host::gtk::ImagePaint

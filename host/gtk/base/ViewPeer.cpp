@@ -3,8 +3,8 @@
 
 #include "host/gtk/base/ViewPeer.h"
 
-#include "host/gtk/base/CairoCanvas.h"
 #include "host/gtk/base/GestureFeed.h"
+#include "host/gtk/base/ThemedCanvas.h"
 #include "platform/Weakly.h"
 
 #include <algorithm>
@@ -311,7 +311,7 @@ void ViewPeer::snapshotDrawing(const View& shown, GtkSnapshot* snapshot)
     graphene_rect_init(&bounds, 0, 0, static_cast<float>(gtk_widget_get_width(_canvas.get())),
         static_cast<float>(gtk_widget_get_height(_canvas.get())));
     auto* cairo = gtk_snapshot_append_cairo(snapshot, &bounds);
-    CairoCanvas canvas(cairo, _context->theme());
+    ThemedCanvas canvas(cairo, _context->theme());
     shown.drawRect(canvas);
     cairo_destroy(cairo);
 }

@@ -4,6 +4,7 @@
 #include "host/gtk/views/ListRowWidget.h"
 
 #include "host/gtk/base/ImagePaint.h"
+#include "host/system/drawing/CairoCanvas.h"
 
 #include <algorithm>
 #include <memory>
@@ -14,7 +15,7 @@ namespace {
 
 constexpr int iconSize = 40, smallIconSize = 16;
 constexpr float markMargin = 8; ///< points beside a check mark in which a touch still counts
-constexpr int dotDiameter = 10, dotStep = 7; ///< dots of several tags overlap
+constexpr int dotHeight = 10;
 
 /// The parts of a row, from its leading edge to its trailing one.
 enum Part { Check, Icon, Texts, Dots, Download, Progress, Chevron, partCount };
@@ -68,18 +69,10 @@ void finalize(GObject* object)
     G_OBJECT_CLASS(trw_list_row_parent_class)->finalize(object);
 }
 
-void drawDots(GtkDrawingArea*, cairo_t* cairo, int /*width*/, int height, gpointer data)
+void drawDots(GtkDrawingArea*, cairo_t* cairo, int /*width*/, int /*height*/, gpointer data)
 {
-    const auto& colors = rowOf(data)->shown->tagColors;
-    for (std::size_t i = 0; i < colors.size(); ++i) {
-        const double x = static_cast<double>(i) * dotStep + dotDiameter / 2.0;
-        cairo_set_source_rgba(cairo, colors[i].red, colors[i].green, colors[i].blue, colors[i].alpha);
-        cairo_arc(cairo, x, height / 2.0, dotDiameter / 2.0 - 0.5, 0, 2 * std::numbers::pi);
-        cairo_fill_preserve(cairo);
-        cairo_set_source_rgba(cairo, 0, 0, 0, 0.2);
-        cairo_set_line_width(cairo, 0.5);
-        cairo_stroke(cairo);
-    }
+    host::system::CairoCanvas canvas(cairo);
+    kit::TagDots::draw(canvas, rowOf(data)->shown->tagDots, dotHeight);
 }
 
 void drawProgress(GtkDrawingArea* area, cairo_t* cairo, int width, int height, gpointer data)
@@ -159,7 +152,7 @@ GtkWidget* makePart(TrwListRow* row, Part part)
     case Texts:
         return texts(row);
     case Dots:
-        return drawing(row, drawDots, dotDiameter, dotDiameter);
+        return drawing(row, drawDots, dotHeight, dotHeight);
     case Download:
         return gtk_image_new_from_icon_name("trw-in-cloud-symbolic");
     case Progress:
@@ -215,10 +208,9 @@ void showMarks(TrwListRow* row, const kit::ListRow& content)
     if (auto* progress = showPart(row, Progress, content.download == kit::DownloadState::Downloading))
         gtk_widget_queue_draw(progress);
     showPart(row, Chevron, content.accessory == kit::RowAccessory::Disclosure && !isEditing);
-    const int count = static_cast<int>(content.tagColors.size());
-    if (auto* dots = showPart(row, Dots, count > 0)) {
-        gtk_drawing_area_set_content_width(
-            GTK_DRAWING_AREA(dots), dotDiameter + std::max(0, count - 1) * dotStep);
+    if (auto* dots = showPart(row, Dots, !content.tagDots.empty())) {
+        gtk_drawing_area_set_content_width(GTK_DRAWING_AREA(dots),
+            static_cast<int>(kit::TagDots::size(content.tagDots.size(), dotHeight).width));
         gtk_widget_queue_draw(dots);
     }
 }

@@ -12,6 +12,7 @@
 #include "screens/list/RowThumbnail.h"
 #include "tests/support/ForwardingCoordinator.h"
 
+#include <map>
 #include <set>
 
 using namespace platform;
@@ -69,7 +70,7 @@ TEST_F(DocumentList, ShowsEveryKindOfItemWithItsDetails)
         EXPECT_THAT(shown.detail, EndsWith(rows[i].detail));
         EXPECT_EQ(shown.download, rows[i].download);
         EXPECT_EQ(shown.accessory, rows[i].accessory);
-        EXPECT_EQ(shown.tagColors.size(), rows[i].dots);
+        EXPECT_EQ(shown.tagDots.size(), rows[i].dots);
         EXPECT_TRUE(shown.image.has_value());
         EXPECT_TRUE(isValidUtf8(shown.title));
     }
@@ -240,6 +241,43 @@ TEST_F(DocumentList, ShowsChangedDetailsWithoutTouchingOtherRows)
     drive.dispatch->runUntilIdle();
     EXPECT_THAT(list->listView()->row(1).detail, HasSubstr("5 bytes"));
     EXPECT_THAT(observer->changedRows, ElementsAre(1U));
+}
+
+TEST_F(DocumentList, PaintsTheDotsAnewWhenTheTableOfTagsChanges)
+{
+    struct Colors : RecordingListDelegate {
+        std::vector<kit::TagDot> documentListControllerDotsForTagNames(
+            const DocumentListControllerDelegate::List&, const std::vector<std::string>& names) override
+        {
+            return {names.size(), {color, Color::white()}};
+        }
+        Color color = Color::gray(0.25F);
+    };
+    const auto colors = std::make_shared<Colors>();
+    drive.mark(drive.writeDocument("Stuff/b.txt"), mark::tags, "Work");
+    drive.writeDocument("Stuff/a.txt");
+    const auto list = shownList(drive.url("Stuff"));
+    list->setDelegate(colors);
+    deliver(list, {{"a.txt"}, {"b.txt"}});
+    const auto row = [&] { return list->listView()->row(1); };
+    ASSERT_THAT(row().tagDots, ElementsAre(kit::TagDot{colors->color, Color::white()}));
+    // Who knows the colours hears of the change after the list.
+    const auto later = drive.notifications->observe(Notification::KeyValueStoreDidChangeExternally,
+        [&](const auto&) { colors->color = Color::gray(0.75F); });
+
+    struct Painted : RecordingListObserver {
+        void rowDidChange(kit::ListView& view, std::size_t index) override
+        {
+            dots[index] = view.row(index).tagDots;
+        }
+        std::map<std::size_t, std::vector<kit::TagDot>> dots;
+    };
+    const auto painted = std::make_shared<Painted>();
+    list->listView()->setListObserver(painted);
+    drive.notifications->post(Notification::KeyValueStoreDidChangeExternally);
+    drive.settle();
+    EXPECT_THAT(
+        painted->dots, ElementsAre(Pair(1U, ElementsAre(kit::TagDot{Color::gray(0.75F), Color::white()}))));
 }
 
 TEST_F(DocumentList, DownloadsADocumentAndShowsHowFarItIs)
