@@ -59,6 +59,7 @@ void DRItem::clearValues()
     _creationDate.reset();
     _contentModificationDate.reset();
     _thumbnail.reset();
+    _thumbnailFetch.reset();
     _tags.clear();
     for (auto* flag : {&_isContainer, &_isDirectory, &_isPackage, &_thumbnailFetched, &_isBookmark,
              &_isDownloaded, &_isSymlink})

@@ -22,7 +22,7 @@ namespace tarrow {
 /// URL is replaced. An empty text, list or optional means that the item has no such attribute.
 ///
 /// A record has no lock. Its fields may be read on any thread, but not while the record is being read again.
-class DRItem {
+class DRItem : public std::enable_shared_from_this<DRItem> {
     struct Token {
         explicit Token() = default;
     };
@@ -68,8 +68,15 @@ public:
     void setIsDirectory(bool value) { _isDirectory = value; }
     bool hasHiddenExtension() const { return _hasHiddenExtension; }
     void setHasHiddenExtension(bool value) { _hasHiddenExtension = value; }
-    /// Fetches the thumbnail at the first question, once for each reading, even when there was none.
+    /// Answers the thumbnail that is in memory, at once. The first question of a reading begins to fetch it
+    /// on a worker when memory does not have it, once for each reading, even when there is none; one that the
+    /// desktop does not have is made there. Main thread.
     const std::optional<Image>& thumbnail();
+    /// Calls back once on the main thread when the fetch that is under way has found a thumbnail, which
+    /// thumbnail() answers from then on. It is not called when no fetch is under way, when there is no
+    /// thumbnail, and when the record is read again or ends before; a fetch that has not begun by then is
+    /// left out. The callback holds weakly what may end first. Main thread.
+    void whenThumbnailArrives(std::function<void()> arrived);
     void setThumbnail(std::optional<Image> image) { _thumbnail = std::move(image); }
     bool thumbnailFetched() const { return _thumbnailFetched; }
     void setThumbnailFetched(bool value) { _thumbnailFetched = value; }
@@ -126,7 +133,10 @@ public:
     static const std::shared_ptr<platform::OperationQueue>& getThumbnailQueue();
 
 private:
-    void fetchThumbnail(const Url& resolved);
+    struct ThumbnailFetch;
+    void fetchThumbnail();
+    void thumbnailsWereRead(
+        const std::weak_ptr<ThumbnailFetch>& fetch, const std::optional<AttributeValue>& thumbnailMap);
     bool readCoordinated(const Url& resolved);
     bool isResolvedURL(const Url& location) const;
     bool readValues(const Url& location);
@@ -145,6 +155,7 @@ private:
     std::string _friendlyFileSize;
     std::optional<Date> _creationDate, _contentModificationDate;
     std::optional<Image> _thumbnail;
+    std::shared_ptr<ThumbnailFetch> _thumbnailFetch; // while it is under way
     std::vector<std::string> _tags;
     bool _isContainer = false, _isDirectory = false, _isPackage = false, _thumbnailFetched = false;
     bool _isBookmark = false, _isDownloaded = false, _isSymlink = false, _canPreview = false;

@@ -41,8 +41,8 @@ enum class AttributeKey : std::uint8_t {
     IsShared, ///< boolean: other people have access to the item
     SharedItemRole, ///< SharedItemRole; missing for an item that is not shared
     DownloadingStatus, ///< DownloadingStatus; missing for an item that the cloud does not know
-    /// ThumbnailMap; missing while there are none. On a worker thread a picture's thumbnail is made at once;
-    /// on the main thread it is made in the background, and a later reading has it.
+    /// ThumbnailMap; missing when there are none. It is decoded, or made when the desktop has none yet,
+    /// before the reading ends, so it is read on worker threads alone.
     ThumbnailMap,
     DocumentIdentifier, ///< unsigned, 32 bits; missing for an item that carries none
 };

@@ -309,7 +309,9 @@ TEST_F(RecordFaultTest, EndsTheAccessesThatItBegan)
     for (const bool isNeeded : {true, false}) {
         decorated->access.isNeeded = isNeeded;
         decorated->access.started = decorated->access.stopped = 0;
-        DRItem::initWithURL(url)->thumbnail();
+        const auto item = DRItem::initWithURL(url);
+        item->thumbnail();
+        settle();
         EXPECT_EQ(decorated->access.started, 2);
         EXPECT_EQ(decorated->access.stopped, isNeeded ? 2 : 0);
     }
@@ -334,20 +336,66 @@ protected:
     int fetches = 0;
 };
 
-TEST_F(ThumbnailTest, IsFetchedOnceWhetherThereIsOneOrNot)
+TEST_F(ThumbnailTest, IsFetchedOnceOffTheMainThreadWhetherThereIsOneOrNot)
 {
     const auto large = Image::fromPixels(2, 1, 1, {0, 0});
     const auto first = DRItem::initWithURL(writeDocument("a.png", "1"));
     const auto second = DRItem::initWithURL(writeDocument("b.png", "1"));
+    std::vector<std::string> arrived;
+    const auto ask = [&](const std::shared_ptr<DRItem>& item) {
+        EXPECT_FALSE(item->thumbnail());
+        item->whenThumbnailArrives([&arrived, item] {
+            EXPECT_TRUE(item->thumbnail());
+            arrived.push_back(item->localizedName());
+        });
+    };
 
     provide({{256, Image::named("small")}, {1024, large}});
+    ask(first);
+    ask(first);
+    EXPECT_EQ(fetches, 0);
+    settle();
     EXPECT_EQ(first->thumbnail(), large);
-    EXPECT_EQ(first->thumbnail(), large);
+    EXPECT_THAT(arrived, testing::ElementsAre("a.png", "a.png"));
     EXPECT_EQ(log->count("DEBUG URL Thumbs: (256: 0x0, 1024: 2x1)"), 1U);
+
     provide({{256, Image::named("small")}});
+    ask(second);
+    settle();
     EXPECT_FALSE(second->thumbnail());
-    EXPECT_FALSE(second->thumbnail());
+    EXPECT_EQ(arrived.size(), 2U) << "nobody is told of a thumbnail that there is not";
+    settle();
     EXPECT_EQ(fetches, 2);
+}
+
+TEST_F(ThumbnailTest, IsNotFetchedForARecordThatEndsOrIsReadAgain)
+{
+    const auto other = writeDocument("b.png", "1");
+    auto ended = DRItem::initWithURL(writeDocument("a.png", "1")), again = DRItem::initWithURL(other);
+    provide({{1024, Image::named("large")}});
+    for (const auto& item : {ended, again}) {
+        EXPECT_FALSE(item->thumbnail());
+        item->whenThumbnailArrives([] { FAIL() << "nobody asked for this version"; });
+    }
+    ended.reset();
+    again->cacheValues();
+    settle();
+    EXPECT_EQ(fetches, 1) << "the record itself was read";
+    EXPECT_FALSE(again->thumbnailFetched());
+}
+
+TEST_F(ThumbnailTest, IsInMemoryForARecordOfTheSameVersion)
+{
+    const auto large = Image::fromPixels(2, 1, 1, {0, 0});
+    const auto url = writeDocument("a.png", "1");
+    const auto first = DRItem::initWithURL(url), second = DRItem::initWithURL(url);
+    std::filesystem::last_write_time(url.path(), std::filesystem::file_time_type());
+    const auto changed = DRItem::initWithURL(url);
+    provide({{1024, large}});
+    first->thumbnail();
+    settle();
+    EXPECT_EQ(second->thumbnail(), large);
+    EXPECT_FALSE(changed->thumbnail());
 }
 
 } // namespace

@@ -5,7 +5,6 @@
 
 #include "host/system/desktop/PixbufImage.h"
 #include "platform/Log.h"
-#include "platform/Weakly.h"
 
 #include <gdk-pixbuf/gdk-pixbuf.h>
 #include <unistd.h>
@@ -17,7 +16,6 @@ namespace host::drive {
 
 namespace {
 
-using platform::weakly;
 using system::Pixbuf;
 
 struct FreeText {
@@ -98,17 +96,8 @@ Pixbuf make(const std::string& folder, const std::string& path, platform::Date m
 
 } // namespace
 
-std::shared_ptr<ThumbnailCache> ThumbnailCache::create(
-    std::string folder, std::shared_ptr<platform::Dispatch> dispatch)
-{
-    return std::shared_ptr<ThumbnailCache>(new ThumbnailCache(std::move(folder), std::move(dispatch)));
-}
-
-ThumbnailCache::ThumbnailCache(std::string folder, std::shared_ptr<platform::Dispatch> dispatch)
+ThumbnailCache::ThumbnailCache(std::string folder)
     : _folder(std::move(folder))
-    , _dispatch(std::move(dispatch))
-    , _queue(_dispatch->makeOperationQueue(
-          "TarrowDriveAppID.thumbnails", platform::QualityOfService::Background))
 {
 }
 
@@ -118,35 +107,13 @@ std::string ThumbnailCache::sharedFolder()
 }
 
 platform::ThumbnailMap ThumbnailCache::thumbnails(
-    const platform::Url& url, platform::Date modified, IfMissing ifMissing)
+    const platform::Url& url, platform::Date modified, IfMissing ifMissing) const
 {
     auto picture = readEntry(_folder, uriOf(url.path()), modified);
-    if (!picture && ifMissing == IfMissing::MakeFromPicture) {
-        if (_dispatch->isMainThread())
-            makeLater(url.path(), modified);
-        else
-            picture = make(_folder, url.path(), modified);
-    }
+    if (!picture && ifMissing == IfMissing::MakeFromPicture)
+        picture = make(_folder, url.path(), modified);
     return picture ? platform::ThumbnailMap{{pixelSize, system::imageOf(picture.get(), 1)}}
                    : platform::ThumbnailMap{};
-}
-
-void ThumbnailCache::makeLater(const std::string& path, platform::Date modified)
-{
-    const std::lock_guard lock(_mutex);
-    if (!_beingMade.insert(path).second)
-        return;
-    _queue->addOperation(
-        [done = weakly(this, &ThumbnailCache::wasMade, path), folder = _folder, path, modified] {
-            make(folder, path, modified);
-            done();
-        });
-}
-
-void ThumbnailCache::wasMade(const std::string& path)
-{
-    const std::lock_guard lock(_mutex);
-    _beingMade.erase(path);
 }
 
 } // namespace host::drive
