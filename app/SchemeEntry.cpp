@@ -4,7 +4,9 @@
 #include "app/SchemeEntry.h"
 
 #include "items/UrlResolution.h"
+#include "platform/CloudDocumentService.h"
 #include "platform/DocumentSharing.h"
+#include "platform/Services.h"
 #include "preview/PreviewMode.h"
 
 namespace tarrow {
@@ -17,7 +19,8 @@ std::optional<Url> targetOf(const Url& url)
     const auto path = platform::percentDecoded(url.path());
     if (!path || !path->starts_with('/'))
         return std::nullopt;
-    return trw_URLByResolvingBookmark(Url::fileURL(*path));
+    const auto location = services().cloudDocumentService().items().urlOfPath(*path);
+    return location ? trw_URLByResolvingBookmark(*location) : std::nullopt;
 }
 
 int previewModeOf(const Url& url)

@@ -11,10 +11,10 @@ namespace tarrow {
 
 namespace {
 
-Url linkDestinationURL(const std::string& destination, const Url& folder)
+std::optional<Url> linkDestinationURL(const std::string& destination, const Url& folder)
 {
-    return destination.starts_with('/') ? Url::fileURL(destination)
-                                        : folder.appendingPathComponent(destination);
+    return services().cloudDocumentService().items().urlOfPath(
+        destination.starts_with('/') ? destination : folder.path() + '/' + destination);
 }
 
 std::uint64_t promisedSize(const Url& url)

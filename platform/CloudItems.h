@@ -9,6 +9,7 @@
 
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 
 namespace platform {
@@ -34,6 +35,11 @@ public:
     /// path exists. It is the very same object when there is nothing to resolve, and when there are too many
     /// links. Any thread.
     virtual Url realURL(const Url& url) const = 0;
+    /// Answers the URL of an absolute path that comes from outside or out of a symbolic link. Behind a link
+    /// ".." leads to the folder above the link's target, as the system reads it, so the links before a
+    /// ".." are resolved; a path without ".." keeps all of them. It answers nothing when a ".." follows what
+    /// is no folder. Any thread; the disk is asked only for a path with "..".
+    virtual std::optional<Url> urlOfPath(const std::string& path) const = 0;
 
     /// Makes the bookmark string that names a document on the account's other devices; it stays valid when
     /// the document is moved or renamed, because it holds the document's identifier beside its place. The

@@ -40,15 +40,14 @@ bool hasForbiddenCharacter(std::string_view text)
     return std::ranges::any_of(text, [](unsigned char c) { return c <= 0x20 || c == 0x7f; });
 }
 
-bool hasEncodedSlash(std::string_view text)
+bool hasExtraSlashes(std::string_view path)
 {
-    return text.find("%2F") != std::string_view::npos || text.find("%2f") != std::string_view::npos;
+    return path.find("//") != std::string_view::npos || (path.size() > 1 && path.ends_with('/'));
 }
 
 std::string withoutExtraSlashes(std::string_view path)
 {
-    // Nearly every path has none: a plain copy is enough, and this is done for every row of a list.
-    if (path.find("//") == std::string_view::npos && (path.size() <= 1 || !path.ends_with('/')))
+    if (!hasExtraSlashes(path))
         return std::string(path);
     std::string out;
     out.reserve(path.size());
@@ -61,12 +60,41 @@ std::string withoutExtraSlashes(std::string_view path)
     return out;
 }
 
+bool hasDotNames(std::string_view path)
+{
+    for (auto at = path.find("/."); at != std::string_view::npos; at = path.find("/.", at + 1)) {
+        auto rest = path.substr(at + 2);
+        if (rest.starts_with('.'))
+            rest.remove_prefix(1);
+        if (rest.empty() || rest.starts_with('/'))
+            return true;
+    }
+    return false;
+}
+
 std::string_view takeUntil(std::string_view& text, char separator)
 {
     const auto end = text.find(separator);
     const auto head = text.substr(0, end);
     text = end == std::string_view::npos ? std::string_view{} : text.substr(end + 1);
     return head;
+}
+
+/// Answers the form of an absolute path in which two paths of one place are equal as texts.
+std::string cleanPath(std::string_view path)
+{
+    // Nearly every path is clean: a plain copy is enough, and this is done for every row of a list.
+    if (!hasDotNames(path))
+        return withoutExtraSlashes(path);
+    std::string out;
+    while (!path.empty()) {
+        const auto name = takeUntil(path, '/');
+        if (name == "..")
+            out.resize(std::min(out.size(), out.rfind('/')));
+        else if (!name.empty() && name != ".")
+            out.append("/").append(name);
+    }
+    return out.empty() ? "/" : out;
 }
 
 std::optional<std::vector<QueryItem>> parseQuery(std::string_view text)
@@ -121,20 +149,21 @@ std::optional<Url> Url::parse(std::string_view text)
     }
     auto path = percentDecoded(place);
     auto query = parseQuery(hasQuery ? rest : std::string_view{});
-    if (!path || !query || hasEncodedSlash(place))
+    if (!path || !query)
         return std::nullopt;
-    const bool isValid = data->scheme == "file" ? path->starts_with('/') : isValidUtf8(*path);
+    const bool isFile = data->scheme == "file";
+    const bool isValid = isFile ? path->starts_with('/') : isValidUtf8(*path);
     if (!isValid)
         return std::nullopt;
     data->kind = path->size() > 1 && path->ends_with('/') ? PathKind::Directory : PathKind::Unknown;
-    data->path = withoutExtraSlashes(*path);
+    data->path = isFile ? cleanPath(*path) : withoutExtraSlashes(*path);
     data->query = std::move(*query);
     return Url(std::move(data));
 }
 
 Url Url::fileURL(std::string_view path, PathKind kind)
 {
-    return fromCleanPath(withoutExtraSlashes(path), kind);
+    return fromCleanPath(cleanPath(path), kind);
 }
 
 Url Url::fromCleanPath(std::string path, PathKind kind)

@@ -26,20 +26,23 @@ struct QueryItem {
 /// missing is an optional.
 ///
 /// A file URL holds the path's bytes as they are on disk, valid UTF-8 or not, so every file of the disk has
-/// one.
+/// one. Its path is clean, because what is decided about a path must hold for the file that the system finds
+/// there: it has no empty name, no "." and no "..". A ".." takes away the name before it, as in every URL;
+/// the disk is not asked, so behind a symbolic link that is another folder than the one the system would
+/// find. What comes from outside or out of a link is therefore read by CloudItems::urlOfPath().
 class Url {
 public:
     /// The longest text that parse() takes; anything longer is refused unread.
     static constexpr std::size_t maximumLength = 64 * 1024;
 
     /// Parses an absolute URL. It answers nothing for a text without a scheme, with a broken percent escape,
-    /// with an encoded NUL or slash in its path, with control characters or blanks, and with escapes that are
-    /// not UTF-8 (a file URL may have those), and for a file URL without an absolute path. A fragment
-    /// ("#...") is dropped from the parts and stays in the text.
+    /// with an encoded NUL, with control characters or blanks, and with escapes that are not UTF-8 (a file
+    /// URL may have those), and for a file URL without an absolute path. A fragment ("#...") is dropped from
+    /// the parts and stays in the text. The path of another URL than a file's keeps its dots.
     static std::optional<Url> parse(std::string_view text);
 
-    /// Answers the URL of an absolute path, given as the bytes that the file system uses. Repeated and
-    /// trailing slashes go; "." and ".." stay as they are, and the disk is not asked.
+    /// Answers the URL of an absolute path, given as the bytes that the file system uses, cleaned as said
+    /// above.
     static Url fileURL(std::string_view path, PathKind kind = PathKind::Unknown);
 
     /// The scheme, as it was written: "file", "tarrowdriveapp".

@@ -43,9 +43,9 @@ protected:
         settle();
         return opened;
     }
-    std::string schemeURL(std::string_view relativePath) const
+    std::string schemeURL(const std::string& pathAsWritten) const
     {
-        return "tarrowdriveapp://" + url(relativePath).path();
+        return "tarrowdriveapp://" + url("").path() + '/' + pathAsWritten;
     }
     void choose(std::string_view type, PropertyDictionary information = {})
     {
@@ -125,6 +125,7 @@ TEST_F(AppDelegateTest, PathsAndQueriesAreDecodedTwiceAndTheLastModeWins)
     for (const Row row : {
              Row{"tarrowdriveapp:///path/to/My%20Doc.txt", expectedPath, PreviewModeQuick},
              {"tarrowdriveapp:///path/to/My%2520Doc.txt", expectedPath, PreviewModeQuick},
+             {"tarrowdriveapp:///path%2Fto%252F.%2FMy%20Doc.txt", expectedPath, PreviewModeQuick},
              {"tarrowdriveapp:/path/to/My%2520Doc.txt", expectedPath, PreviewModeQuick},
              {"tarrowdriveapp://any:1@host:80/path/to/My%20Doc.txt?mode=details#part", expectedPath,
                  PreviewModeDetails},
@@ -157,16 +158,15 @@ TEST_F(AppDelegateTest, BadURLsAreRefusedAndNothingMoves)
         "", "no URL", "file://" + drivePath + "/Folder", "javascript:alert(1)",
         "TarrowDriveApp://" + drivePath + "/Folder", "tarrowdriveapp", "--option", "-h", inside + "\nmore",
         inside + " ", "tarrowdriveapp:///a%zz", "tarrowdriveapp:///a%4", "tarrowdriveapp:///a%",
-        "tarrowdriveapp:///a%00b", "tarrowdriveapp:///a%2Fb", "tarrowdriveapp:///%ff",
-        "tarrowdriveapp:///%c0%ae",
+        "tarrowdriveapp:///a%00b", "tarrowdriveapp:///%ff", "tarrowdriveapp:///%c0%ae",
         // These are URLs of our own scheme, but none names an item of the drive.
         "tarrowdriveapp:", "tarrowdriveapp:///", "tarrowdriveapp:///etc/passwd", schemeURL("../../../drive"),
         schemeURL("Folder/%2e%2e/%2E./%252e%252e/account.json"), schemeURL("Folder/a/../../../.."),
-        schemeURL("Folder/note.txt/.."), schemeURL("../../documents-evil/Folder"),
-        schemeURL("Folder/gone.txt"), schemeURL("Folder/note.txt%2500"), schemeURL("Folder/%25ff"),
-        schemeURL("Folder\\note.txt"), schemeURL(std::string(256, 'a')),
-        schemeURL("Folder/" + std::string(5000, 'a')), "tarrowdriveapp:///" + std::string(1'000'000, 'a'),
-        [] {
+        schemeURL("Folder/note.txt/.."), schemeURL("gone/../Folder"),
+        schemeURL("../../documents-evil/Folder"), schemeURL("Folder/gone.txt"),
+        schemeURL("Folder/note.txt%2500"), schemeURL("Folder/%25ff"), schemeURL("Folder\\note.txt"),
+        schemeURL(std::string(256, 'a')), schemeURL("Folder/" + std::string(5000, 'a')),
+        "tarrowdriveapp:///" + std::string(1'000'000, 'a'), [] {
             std::string deep = "tarrowdriveapp://";
             for (int i = 0; i < 10'000; ++i)
                 deep += "/a";
@@ -200,6 +200,10 @@ TEST_F(AppDelegateTest, URLsOpenItemsOfTheDrive)
     EXPECT_THAT(log->activities(), testing::Contains("AppDelegate: openURL"));
     EXPECT_TRUE(open(schemeURL("My%2520Folder")));
     EXPECT_THAT(stack(), ElementsAre(top, "My Folder"));
+    write("My Folder/deep/b.txt");
+    drive.writeLink("link", "My Folder/deep");
+    EXPECT_TRUE(open(schemeURL("link%2F..%2F100%2525.txt")));
+    EXPECT_EQ(browser->itemManager()->item()->url(), url("My Folder/100%.txt"));
 }
 
 TEST_F(AppDelegateTest, ARecentDocumentIsLookedForInThreeWaysInTurn)

@@ -36,6 +36,9 @@ TEST_F(UrlResolutionTest, KnowsTheTwoSpecialFolders)
     std::filesystem::create_directories(sketches.path() + "/Documents");
     EXPECT_TRUE(trw_isDesktopOrDocumentsFolder(at("Documents")));
     EXPECT_TRUE(trw_isDesktopOrDocumentsFolder(at("Desktop")));
+    for (const std::string way :
+        {"/./Desktop", "/Desktop/.", "/Notes/../Desktop", "/../BrindleDefault/Desktop/"})
+        EXPECT_TRUE(trw_isDesktopOrDocumentsFolder(Url::fileURL(root().path() + way))) << way;
     for (const auto& other : {at("Documents/Documents"), at("Notes/Desktop"), at("documents"), root(),
              sketches, sketches.appendingPathComponent("Documents"), Url::fileURL("/Documents")})
         EXPECT_FALSE(trw_isDesktopOrDocumentsFolder(other)) << other.path();

@@ -3,6 +3,7 @@
 
 #include "host/drive/records/RealPath.h"
 
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include <array>
@@ -47,6 +48,12 @@ std::optional<std::string> linkTarget(const std::string& path, bool& exists)
                       : std::nullopt;
 }
 
+bool isFolder(const std::string& path)
+{
+    struct stat found { };
+    return ::lstat(path.c_str(), &found) == 0 && S_ISDIR(found.st_mode);
+}
+
 std::optional<std::string> resolve(const std::string& path, LastName lastName)
 {
     std::string pending = path, resolved;
@@ -59,7 +66,7 @@ std::optional<std::string> resolve(const std::string& path, LastName lastName)
         if (name == ".")
             continue;
         if (name == "..") {
-            if (!exists)
+            if (!resolved.empty() && !(exists && isFolder(resolved)))
                 return std::nullopt;
             if (!resolved.empty())
                 removeLastName(resolved);

@@ -10,7 +10,7 @@ namespace host::drive {
 
 /// Resolves every symbolic link in an absolute path, also in its last name, as far as the path exists. The
 /// part that does not exist is appended unchanged. Answers nothing when there are too many links (a loop), or
-/// when ".." follows a name that does not exist.
+/// when ".." follows something that is no folder.
 std::optional<std::string> realPath(const std::string& path);
 
 /// Resolves a path like realPath(), but keeps a link as the last name.

@@ -28,6 +28,11 @@ bool isWithin(const Url& url, const std::string& folder)
     return real && Url::fileURL(*real).isWithin(Url::fileURL(folder));
 }
 
+bool leadsUpwards(std::string_view path)
+{
+    return path.ends_with("/..") || path.find("/../") != std::string_view::npos;
+}
+
 Error unusableBookmark(const char* sentence)
 {
     return cloudError(CloudErrorCode::UnusableBookmark, {}, sentence);
@@ -100,6 +105,14 @@ Url LocalCloudItems::realURL(const Url& url) const
 {
     const auto real = url.isFileURL() ? realPath(url.path()) : std::nullopt;
     return real && *real != url.path() ? Url::fileURL(*real) : url;
+}
+
+std::optional<Url> LocalCloudItems::urlOfPath(const std::string& path) const
+{
+    if (!leadsUpwards(path))
+        return Url::fileURL(path);
+    const auto real = realPathOfEntry(path);
+    return real ? std::optional(Url::fileURL(*real)) : std::nullopt;
 }
 
 /// A downloaded document has another inode than its promise, so the index is told.

@@ -23,6 +23,7 @@ public:
     bool isInDocumentsArea(const platform::Url& url) const override;
     bool isInTrash(const platform::Url& url) const override;
     platform::Url realURL(const platform::Url& url) const override;
+    std::optional<platform::Url> urlOfPath(const std::string& path) const override;
     void RZBookmarkableStringFromDocumentURL(const platform::Url& url,
         std::function<void(platform::Result<std::string>)> completion) const override;
     std::unique_ptr<platform::ItemDownload> startDownload(

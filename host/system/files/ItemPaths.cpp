@@ -47,7 +47,9 @@ std::string itemName(std::string_view name)
 {
     const bool isPromise =
         name.starts_with('.') && name.ends_with(promiseSuffix) && name.size() > promiseSuffix.size() + 1;
-    return std::string(isPromise ? name.substr(1, name.size() - promiseSuffix.size() - 1) : name);
+    const auto item = isPromise ? name.substr(1, name.size() - promiseSuffix.size() - 1) : name;
+    // A promise of "." or ".." would stand for the folder that it lies in, or for the one above.
+    return std::string(item == "." || item == ".." ? name : item);
 }
 
 bool isPassingName(std::string_view name)

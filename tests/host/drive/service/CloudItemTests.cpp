@@ -94,8 +94,33 @@ TEST_F(CloudItemTests, whatLiesInTheDriveAndInItsTrash)
     EXPECT_EQ(items().realURL(_drive.url("inner/a.txt")), document);
     EXPECT_EQ(items().realURL(_drive.url("dangling/x")), _drive.url("Documents/gone/deeper/x"));
     EXPECT_EQ(items().realURL(_drive.url("loop/x")), _drive.url("loop/x"));
-    EXPECT_EQ(items().realURL(Url::fileURL("/../..")), Url::fileURL("/"));
+    EXPECT_EQ(items().realURL(Url::fileURL("/")), Url::fileURL("/"));
     EXPECT_TRUE(items().realURL(document).isSameObject(document));
+}
+
+TEST_F(CloudItemTests, aPathFromOutsideIsReadAsTheSystemReadsIt)
+{
+    _drive.writeDocument("Notes/Trips/a.txt");
+    _drive.makeFolder("Desktop");
+    _drive.writeLink("Desktop/link", "../Notes/Trips");
+    const auto drive = _drive.layout().defaultContainer();
+    const struct {
+        const char* path;
+        const char* location; // empty: there is none
+    } rows[] = {
+        {"/Desktop/link/../a.txt", "/Notes/a.txt"}, // not /Desktop/a.txt
+        {"/Desktop/link/..", "/Notes"},
+        {"/Notes/../Desktop/link", "/Desktop/link"},
+        {"/Desktop/link/a.txt", "/Desktop/link/a.txt"},
+        {"/Desktop/./link/./a.txt", "/Desktop/link/a.txt"},
+        {"/gone/../Desktop", ""},
+        {"/Notes/Trips/a.txt/..", ""},
+    };
+    for (const auto& row : rows) {
+        const auto url = items().urlOfPath(drive + row.path);
+        EXPECT_EQ(url ? url->path() : "", *row.location ? drive + row.location : "") << row.path;
+    }
+    EXPECT_EQ(items().urlOfPath("/../.."), Url::fileURL("/"));
 }
 
 TEST_F(CloudItemTests, bookmarksLeadToTheirDocument)

@@ -288,6 +288,15 @@ TEST_F(ItemTests, referencesStandForDocumentsOfContainers)
     EXPECT_FALSE(items().isExternalDocumentReference(_drive.url("Gone.trwref")));
 }
 
+TEST_F(ItemTests, noPromiseStandsForTheFolderThatItLiesIn)
+{
+    for (const char* name : {"Documents/...trwpromise", "Documents/....trwpromise"}) {
+        const auto url = _drive.writeDocument(name, host::drive::PromiseRecord{}.toJson());
+        EXPECT_FALSE(items().isItemPromise(url)) << name;
+        EXPECT_EQ(items().logicalURLForPromise(url), url);
+    }
+}
+
 TEST_F(ItemTests, aliasesLeadToItemsThatAreThere)
 {
     const auto document = _drive.writeDocument("Documents/a.txt");
