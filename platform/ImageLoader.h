@@ -33,6 +33,9 @@ struct ImageLimits {
     double scale = 1; ///< how many pixels of the result make a point of the interface
     std::uint64_t maxFileBytes = 256ULL << 20; ///< a larger file is refused unread
     std::uint64_t maxSourcePixels = 100'000'000; ///< a picture with more is refused when its header says so
+    /// A photo in which the rows follow each other is made smaller while it is read, so it may have this many
+    /// pixels.
+    std::uint64_t maxScaledSourcePixels = 1'000'000'000;
     std::uint64_t maxAnimationBytes = 64ULL
         << 20; ///< an animation that takes more shows its first frame only
     std::uint64_t maxPixels = 0; ///< the most pixels of the result in all; 0: as many as the sides allow

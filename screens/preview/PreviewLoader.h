@@ -27,7 +27,8 @@ PreviewLimits previewLimitsForMainScreen();
 PreviewLimits previewLimitsForCloseLook();
 
 /// Reads the content of a document's preview. It never downloads a document, and opens regular files only.
-/// It refuses pictures of more than 100 million pixels or 256 MiB, shows the frames of an animation up to 64
+/// It refuses pictures of more than 100 million pixels (photos that are made smaller while they are read: of
+/// more than 1,000 million) or 256 MiB, shows the frames of an animation up to 64
 /// MiB, and reads the first MiB of a text (see ImageLimits and PreviewLimits). It blocks while it reads; any
 /// thread. `isCancelled` is asked between the steps; when it has answered true, the content must not be used.
 PreviewContent loadPreview(

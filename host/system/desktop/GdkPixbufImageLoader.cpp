@@ -5,6 +5,7 @@
 
 #include "host/system/desktop/GifFrames.h"
 #include "host/system/desktop/JpegEnd.h"
+#include "host/system/desktop/JpegRows.h"
 #include "host/system/desktop/PixbufImage.h"
 #include "host/system/files/FileDescriptor.h"
 #include "host/system/files/SystemErrors.h"
@@ -81,15 +82,33 @@ PixelSize fittedEitherWay(PixelSize size, const ImageLimits& limits)
     return lying.height > standing.width ? PixelSize{lying.height, lying.width} : standing;
 }
 
+/// Answers how many pixels the decoder makes of a JPEG picture that is wanted in a smaller size. It leaves
+/// out a half, three quarters or seven eighths of each side, as long as the result is not too small.
+std::uint64_t pixelsOfScaledJpeg(PixelSize size, PixelSize wanted)
+{
+    constexpr int mostShrunk = 8;
+    int divisor = 1;
+    while (divisor < mostShrunk && size.width / (2 * divisor) >= wanted.width
+        && size.height / (2 * divisor) >= wanted.height)
+        divisor *= 2;
+    return static_cast<std::uint64_t>(size.width / divisor)
+        * static_cast<std::uint64_t>(size.height / divisor);
+}
+
 /// Reads the picture's own size from its header.
 Result<PixelSize> sizeInFile(const std::string& path, const ImageLimits& limits)
 {
     int width = 0, height = 0;
     if (!gdk_pixbuf_get_file_info(path.c_str(), &width, &height) || width <= 0 || height <= 0)
         return imageError(ImageErrorCode::Damaged);
-    if (static_cast<std::uint64_t>(width) * static_cast<std::uint64_t>(height) > limits.maxSourcePixels)
+    const PixelSize size{width, height};
+    const auto pixels = static_cast<std::uint64_t>(width) * static_cast<std::uint64_t>(height);
+    const bool isScaled =
+        pixels > limits.maxSourcePixels && pixels <= limits.maxScaledSourcePixels && isJpegInRows(path);
+    if ((isScaled ? pixelsOfScaledJpeg(size, fittedEitherWay(size, limits)) : pixels)
+        > limits.maxSourcePixels)
         return imageError(ImageErrorCode::TooLarge);
-    return PixelSize{width, height};
+    return size;
 }
 
 /// Turns the picture as its camera noted, and scales it down to the limits.

@@ -101,6 +101,46 @@ TEST(ImageLoader, ReadsTheFramesOfAnAnimation)
     EXPECT_TRUE(half->breaksOff);
 }
 
+/// Answers a grey JPEG picture of one colour whose frame has this mark.
+std::string greyJpeg(unsigned width, unsigned height, char frame)
+{
+    using namespace std::string_literals;
+    const auto number = [](unsigned value) {
+        return std::string{static_cast<char>(value >> 8), static_cast<char>(value & 0xFF)};
+    };
+    // Each table has one code of one bit, "no difference" and "end of block", so two bits are a block.
+    const auto table = [](char kind) { return "\xFF\xC4\0\x14"s + kind + "\1"s + std::string(16, '\0'); };
+    const std::size_t blocks = std::size_t{(width + 7) / 8} * ((height + 7) / 8);
+    return "\xFF\xD8\xFF\xDB\0\x43\0"s + std::string(64, '\1') + "\xFF"s + frame + "\0\x0B\x08"s
+        + number(height) + number(width) + "\1\1\x11\0"s + table('\0') + table('\x10')
+        + "\xFF\xDA\0\x08\1\1\0\0\x3F\0"s + std::string(blocks / 4 + 1, '\0') + "\xFF\xD9"s;
+}
+
+TEST(ImageLoader, ShowsLargePhotosThatAreMadeSmallerWhileTheyAreRead)
+{
+    const TemporaryDirectory folder;
+    const GdkPixbufImageLoader loader;
+    const ImageLimits limits{.maxWidth = 400, .maxHeight = 400};
+    constexpr char rows = '\xC0', progressive = '\xC2';
+    const auto photo = loader.loadPicture(
+        folder.write("photo.jpg", greyJpeg(12000, 9000, rows)), limits, [] { return false; });
+    ASSERT_TRUE(photo);
+    EXPECT_EQ(photo->sourceWidth, 12000);
+    EXPECT_EQ(photo->frames.front().image.pixelWidth(), 400);
+    EXPECT_EQ(photo->frames.front().image.pixels()[50'000], 0xFF808080);
+    EXPECT_FALSE(photo->breaksOff);
+
+    auto whole = limits;
+    whole.maxWidth = whole.maxHeight = 12000;
+    const std::pair<std::string, ImageLimits> refused[] = {{greyJpeg(12000, 9000, progressive), limits},
+        {greyJpeg(12000, 9000, rows), whole}, {greyJpeg(60000, 60000, rows), limits}};
+    for (const auto& [content, allowed] : refused) {
+        const auto loaded = loader.load(folder.write("large.jpg", content), allowed);
+        ASSERT_TRUE(loaded.error);
+        EXPECT_EQ(loaded.error->code(), static_cast<int>(ImageErrorCode::TooLarge));
+    }
+}
+
 struct EndRow {
     const char* name;
     std::string_view bytes;
