@@ -5,6 +5,7 @@
 
 #include "browser/ListLogging.h"
 #include "browser/NavController.h"
+#include "browser/RunningChanges.h"
 #include "drawing/FileTags.h"
 #include "items/MenuEnableChecks.h"
 #include "kit/controllers/NavigationItem.h"
@@ -57,6 +58,7 @@ void NavController::initNewListController(const List& list)
     list->view()->setBackground(platform::Color::white());
     configureToolbar(list);
     list->setDelegate(self());
+    showRunningChanges(list);
 }
 
 void NavController::configureNavBar(const List& list)
@@ -112,6 +114,27 @@ void NavController::configureToolbar(const List& list)
         createStatusBarButtonPressDelegate(*list, _upgradeOffer, self());
     displayStatusBar(*list);
     updateStatusUI(list);
+}
+
+void NavController::showRunningChanges(const List& list)
+{
+    if (!_runningChanges)
+        return;
+    list->setChangingItems(_runningChanges->items());
+    showProgressOfChanges(list);
+}
+
+void NavController::showProgressOfChanges(const List& list)
+{
+    const auto bar = statusBar(*list);
+    if (!bar)
+        return;
+    const bool hadProgress = !bar->progressItems().empty();
+    const auto change = _runningChanges->longOne();
+    bar->showProgress(
+        change ? RunningChanges::progressText(*change) : std::string(), [change] { change->cancel(); });
+    if (!list->editing() && hadProgress != (change != nullptr))
+        displayStatusBar(*list);
 }
 
 void NavController::updateStatusUI(const List& list)

@@ -5,6 +5,7 @@
 
 #include "browser/ItemDeletion.h"
 #include "browser/NavController.h"
+#include "browser/RunningChanges.h"
 #include "items/DRItem.h"
 #include "items/FileUtils.h"
 #include "items/ItemChange.h"
@@ -190,6 +191,29 @@ void NavController::showNewFolderPromptDuringMoveItemsToMove(
     presentViewController(_folderPromptAlert->alert(), true);
 }
 
+void NavController::changeBegun(const std::shared_ptr<ItemChange>& change)
+{
+    if (!_runningChanges) {
+        const auto inEveryList = [](void (NavController::*show)(const List&)) {
+            return [show](NavController& self) {
+                for (const auto& screen : self.viewControllers()) {
+                    if (const auto list = std::dynamic_pointer_cast<screens::DocumentListController>(screen))
+                        (self.*show)(list);
+                }
+            };
+        };
+        _runningChanges =
+            RunningChanges::create(weakly(this, inEveryList(&NavController::showRunningChanges)),
+                weakly(this, inEveryList(&NavController::showProgressOfChanges)));
+    }
+    _runningChanges->begun(change);
+}
+
+void NavController::changeEnded()
+{
+    _runningChanges->forgetEnded();
+}
+
 void NavController::makeFolderForItems(
     const Url& folder, const std::vector<Url>& items, const AccountSession& asked)
 {
@@ -197,12 +221,14 @@ void NavController::makeFolderForItems(
     const auto change = ItemChange::begin(
         asked, items, [folder](ItemChange& begun) { return makeFolder(folder, begun, op); },
         weakly(this, [prompt = _folderPromptAlert](NavController& self, const FolderOutcome& outcome) {
+            self.changeEnded();
             const auto message = outcome.refused ? messageAbout(outcome.refused) : messageAbout(outcome.left);
             if (isOnScreen(*prompt))
                 prompt->answer(!outcome.refused && outcome.left.empty(), message);
             else if (prompt->isWaiting() && !message.empty())
                 UIUtils::showAlertMessageParentViewController(message, {}, self.topViewController());
         }));
+    changeBegun(change);
     _folderPromptAlert->waitForAnswer([change] { change->cancel(); });
 }
 
@@ -276,9 +302,10 @@ void NavController::moveItemsToDirectoryAndShowErrorsToDirectory(
     const std::vector<Url>& items, const Url& directory)
 {
     const AccountSession asked;
-    ItemChange::begin(
-        asked, items, [directory](ItemChange& change) { return moveAll(change, directory); },
+    const auto change = ItemChange::begin(
+        asked, items, [directory](ItemChange& begun) { return moveAll(begun, directory); },
         weakly(this, [asked](NavController& self, const std::vector<Error>& errors) {
+            self.changeEnded();
             if (!asked.isCurrent())
                 return;
             const auto top = self.topViewController();
@@ -288,6 +315,7 @@ void NavController::moveItemsToDirectoryAndShowErrorsToDirectory(
                 UIUtils::showAlertMessageParentViewController(
                     localizedPlural(".DICT.CANNOT_MOVE_ITEMS.%d", {count(errors)}), {}, top);
         }));
+    changeBegun(change);
 }
 
 void NavController::showRenamePrompt(const Url& url)
@@ -318,6 +346,7 @@ void NavController::renameConfirmed(const Url& url, const std::string& name, con
 {
     const auto renamed = [prompt = _folderPromptAlert, name](
                              NavController& self, const std::optional<Error>& error) {
+        self.changeEnded();
         if (isOnScreen(*prompt))
             prompt->answer(!error, messageAbout(error));
         else if (prompt->isWaiting() && error && !error->is(FileErrorCode::Cancelled))
@@ -325,6 +354,7 @@ void NavController::renameConfirmed(const Url& url, const std::string& name, con
                 *error, name, self.topViewController());
     };
     const auto change = UIUtils::renameItemAtURLToNameCompletion(url, name, weakly(this, renamed), asked);
+    changeBegun(change);
     _folderPromptAlert->waitForAnswer([change] { change->cancel(); });
 }
 
@@ -376,6 +406,7 @@ void NavController::deleteConfirmed(
     const std::vector<Url>& urls, const Completion& finished, const AccountSession& asked)
 {
     const auto showFailures = [asked](NavController& self, const DeletionOutcome& outcome) {
+        self.changeEnded();
         if (!asked.isCurrent())
             return;
         const auto failures = static_cast<std::int64_t>(outcome.failures);
@@ -385,11 +416,12 @@ void NavController::deleteConfirmed(
             UIUtils::showAlertMessageParentViewController(
                 localizedPlural(".DICT.CANNOT_DELETE_ITEMS.%d", {failures}), {}, self.topViewController());
     };
-    ItemChange::begin(asked, urls, deleteItems,
+    const auto change = ItemChange::begin(asked, urls, deleteItems,
         [finished, show = weakly(this, showFailures)](const DeletionOutcome& outcome) {
             call(finished);
             show(outcome);
         });
+    changeBegun(change);
 }
 
 void NavController::showDICUrlCompletion(

@@ -35,6 +35,8 @@ namespace tarrow {
 class DRItem;
 class FilenamePrompt;
 class PreviewItemManager;
+class ItemChange;
+class RunningChanges;
 
 /// The browser: a stack of the drive's folder lists with a preview on top of them, or the screen that says
 /// that the drive is not available. It follows the cloud account and keeps the line under each list up to
@@ -225,6 +227,13 @@ private:
     void performDelete(
         const platform::Url& url, const std::shared_ptr<kit::View>& view, const Completion& completion);
     void performInfo(const platform::Url& url);
+    /// Dims the rows of a change's items and shows its progress from now on.
+    void changeBegun(const std::shared_ptr<ItemChange>& change);
+    /// Some change has ended.
+    void changeEnded();
+    /// Shows in a list what is being changed and how far it has come.
+    void showRunningChanges(const List& list);
+    void showProgressOfChanges(const List& list);
     void makeFolderForItems(
         const platform::Url& folder, const std::vector<platform::Url>& items, const AccountSession& asked);
     void renameConfirmed(const platform::Url& url, const std::string& name, const AccountSession& asked);
@@ -249,6 +258,7 @@ private:
     std::shared_ptr<const platform::StorageOffer> _upgradeOffer;
     std::uint64_t _quotaBytes = 0;
     std::optional<AccountSession> _moveAsked; ///< who was asked last for the destination of a move
+    std::shared_ptr<RunningChanges> _runningChanges; ///< null before the first change
     std::vector<platform::Observation> _observations;
 };
 

@@ -92,6 +92,25 @@ void DocumentListControllerStatusBar::showUpgradeOffer(const Offer& offer)
     _labelsView->showLowQuota(isToBeShown(offer));
 }
 
+void DocumentListControllerStatusBar::showProgress(const std::string& text, std::function<void()> cancel)
+{
+    if (text.empty()) {
+        _progressItems.clear();
+        return;
+    }
+    if (_progressItems.empty()) {
+        _progressView = DriveStatusLabelView::initWithFrame(_labelsView->frame());
+        _progressView->setPrimaryLabel(makePrimaryLabel());
+        _progressView->addSubview(_progressView->primaryLabel());
+        _progressItems = {std::make_shared<BarButtonItem>(SystemItem::FlexibleSpace),
+            std::make_shared<BarButtonItem>(_progressView),
+            std::make_shared<BarButtonItem>(SystemItem::FlexibleSpace),
+            std::make_shared<BarButtonItem>(SystemItem::Cancel)};
+    }
+    _progressView->setPrimaryLabelText(text);
+    _progressItems.back()->setAction([cancel = std::move(cancel)](const auto&) { cancel(); });
+}
+
 void DocumentListControllerStatusBar::upgradeStoragePressed(const StorageUpgradeButton& button)
 {
     static constexpr Operation op{"-[DocumentListControllerStatusBar upgradeStoragePressed:]"};
@@ -128,7 +147,7 @@ void createStatusBarButtonPressDelegate(DocumentListController& list, const Offe
 void displayStatusBar(DocumentListController& list)
 {
     if (const auto shown = statusBar(list))
-        list.setToolbarItems(shown->toolbarItems());
+        list.setToolbarItems(shown->progressItems().empty() ? shown->toolbarItems() : shown->progressItems());
 }
 
 } // namespace tarrow

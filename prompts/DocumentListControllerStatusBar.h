@@ -6,6 +6,7 @@
 #include "kit/controllers/BarButtonItem.h"
 #include "platform/StorageOffers.h"
 
+#include <functional>
 #include <memory>
 #include <string>
 
@@ -40,6 +41,9 @@ public:
     void setStatusText(const std::string& text);
     /// Gives the button an offer, and shows the button when the offer says that storage is low.
     void showUpgradeOffer(const Offer& offer);
+    /// Shows how far a change of items has come, and a button that cancels it, in place of the line and its
+    /// button; an empty text shows those again. displayStatusBar() brings it into the toolbar.
+    void showProgress(const std::string& text, std::function<void()> cancel);
     /// The user pressed the button. Its link's own action is performed. When the link has none and leaves the
     /// upgrade to the application, the delegate is told.
     void upgradeStoragePressed(const screens::StorageUpgradeButton& button);
@@ -48,11 +52,14 @@ public:
     std::shared_ptr<DocumentListControllerStatusBarDelegate> delegate() const { return _delegate.lock(); }
     /// The toolbar's items: flexible space, the content, flexible space.
     const kit::BarButtonItems& toolbarItems() const { return _toolbarItems; }
+    /// The items while a progress is shown, else none.
+    const kit::BarButtonItems& progressItems() const { return _progressItems; }
 
 private:
     std::shared_ptr<DriveStatusLabelView> _labelsView;
     std::weak_ptr<DocumentListControllerStatusBarDelegate> _delegate;
-    kit::BarButtonItems _toolbarItems;
+    kit::BarButtonItems _toolbarItems, _progressItems;
+    std::shared_ptr<DriveStatusLabelView> _progressView;
 };
 
 // These serve the status bar of a folder list. The list owns its status bar.
@@ -65,7 +72,7 @@ void setStatusBar(
 void createStatusBarButtonPressDelegate(screens::DocumentListController& list,
     const DocumentListControllerStatusBar::Offer& offer,
     const std::shared_ptr<DocumentListControllerStatusBarDelegate>& delegate);
-/// Puts the status bar into the list's toolbar.
+/// Puts the status bar into the list's toolbar, or the progress that it shows.
 void displayStatusBar(screens::DocumentListController& list);
 
 } // namespace tarrow

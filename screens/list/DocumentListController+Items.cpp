@@ -18,6 +18,7 @@
 #include "screens/list/FolderContents.h"
 
 #include <algorithm>
+#include <unordered_set>
 #include <utility>
 
 namespace screens {
@@ -189,9 +190,41 @@ void DocumentListController::download(const Url& url)
 
 void DocumentListController::perform(DocumentListAction action, const Url& url)
 {
-    if (const auto told = delegate())
-        told->documentListControllerPerformActionURLOriginatingViewCompletion(
-            self(), static_cast<int>(action), url, anchorFor(url), {});
+    const auto told = delegate();
+    if (!told)
+        return;
+    // The row is dimmed until the delegate says that the action has ended.
+    const auto number = ++_lastAction;
+    _actions.emplace(number, url);
+    dimBusyRows();
+    told->documentListControllerPerformActionURLOriginatingViewCompletion(self(), static_cast<int>(action),
+        url, anchorFor(url), weakly(this, &DocumentListController::actionEnded, number));
+}
+
+void DocumentListController::actionEnded(std::size_t number)
+{
+    if (_actions.erase(number) > 0)
+        dimBusyRows();
+}
+
+void DocumentListController::setChangingItems(std::vector<Url> items)
+{
+    if (items == _changingItems)
+        return;
+    _changingItems = std::move(items);
+    dimBusyRows();
+}
+
+void DocumentListController::dimBusyRows()
+{
+    if (!_rows || !_rows->rows())
+        return;
+    std::unordered_set<kit::RowId> busy;
+    for (const auto& item : _changingItems)
+        busy.insert(_rows->rows()->idFor(item));
+    for (const auto& [number, item] : _actions)
+        busy.insert(_rows->rows()->idFor(item));
+    _rows->setDimmed(std::move(busy));
 }
 
 std::shared_ptr<kit::View> DocumentListController::anchorFor(const Url& url)

@@ -196,7 +196,10 @@ void DocumentListController::contentsDidChange(const FolderContentsUpdate& updat
     const auto keepsAlive = self();
     _state = update.stage;
     _failure = update.error;
+    const bool isFirst = !_rows->rows();
     _rows->setRows(update.rows);
+    if (isFirst)
+        dimBusyRows();
     _rows->invalidateDetails(update.touched);
     if (std::exchange(_isReordered, false)) {
         // Nearly every row has moved, so the list scrolls to the top.

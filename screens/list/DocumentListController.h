@@ -87,6 +87,10 @@ public:
     /// Answers whether the list offers a search field of its own.
     virtual bool shouldShowSearch() const { return true; }
 
+    /// Dims the rows of items that are being changed, in place of the ones before. Items of other folders are
+    /// ignored.
+    void setChangingItems(std::vector<Url> items);
+
     /// Runs an action that opens a document outside the program, after the questions that must be asked
     /// first. There are none here, so the action runs at once.
     static void openOutOfDriveViewControllerAction(const Url& document,
@@ -145,6 +149,8 @@ private:
     void reportRemovalIfShown();
     void open(const Url& url, FolderEntryKind kind);
     void perform(DocumentListAction action, const Url& url);
+    void actionEnded(std::size_t number);
+    void dimBusyRows();
     kit::MenuAction downloadEntry(const Url& url);
     void download(const Url& url);
     /// Answers the place of an item's row for a popover, or the list itself when the row is not visible.
@@ -169,6 +175,9 @@ private:
         _libraries; ///< the drive's top level; it reports libraries that come or go
     std::vector<FolderSnapshot::ExtraItem> _shownLibraries;
     std::map<std::string, std::shared_ptr<void>> _associatedObjects;
+    std::vector<Url> _changingItems;
+    std::map<std::size_t, Url> _actions; ///< by their numbers, the items whose actions have not ended
+    std::size_t _lastAction = 0;
     DocumentListActionSet _availableActions = 0;
     ListOrder _order;
     bool _editing = false;

@@ -87,6 +87,7 @@ kit::ListRow DocumentRowSource::rowAtIndex(const kit::ListView&, std::size_t ind
     const auto entry = _rows->entry(index);
     kit::ListRow row;
     row.id = _rows->ids()[index];
+    row.isDimmed = _dimmed.contains(row.id);
     row.image = iconFor(index, entry);
     row.title = displayName(entry.name);
     row.accessory = opensAsFolder(entry.kind) ? kit::RowAccessory::Disclosure : kit::RowAccessory::None;
@@ -278,6 +279,18 @@ void DocumentRowSource::detailsArrived(kit::RowId id, RowDetails details)
     if (isNews)
         tellIfVisible(id);
     fetchThumbnails();
+}
+
+void DocumentRowSource::setDimmed(std::unordered_set<kit::RowId> rows)
+{
+    const auto before = std::exchange(_dimmed, std::move(rows));
+    const auto list = _list.lock();
+    const auto range = list && _rows ? list->visibleRows() : kit::RowRange();
+    for (auto row = range.first; row < range.end() && row < _rows->count(); ++row) {
+        const auto id = _rows->ids()[row];
+        if (before.contains(id) != _dimmed.contains(id))
+            list->rowChanged(row);
+    }
 }
 
 void DocumentRowSource::tellIfVisible(kit::RowId id) const

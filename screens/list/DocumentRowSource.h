@@ -14,6 +14,7 @@
 #include <memory>
 #include <string>
 #include <unordered_map>
+#include <unordered_set>
 #include <vector>
 
 namespace kit {
@@ -40,6 +41,9 @@ public:
     /// Sets the rows. The caller tells the list the difference.
     void setRows(std::shared_ptr<const DocumentRows> rows) { _rows = std::move(rows); }
     void setTagDots(TagDots tagDots) { _tagDots = std::move(tagDots); }
+
+    /// Dims these rows, in place of the ones before.
+    void setDimmed(std::unordered_set<kit::RowId> rows);
 
     /// Answers the place of an item, which its row shows before the details; none at first. Called on the
     /// main thread for rows that are about to be seen.
@@ -97,6 +101,7 @@ private:
     TagDots _tagDots;
     Places _places;
     std::unordered_map<kit::RowId, Known> _known;
+    std::unordered_set<kit::RowId> _dimmed;
     mutable std::unordered_map<std::string, std::string> _iconsByExtension, _kindsByExtension;
 };
 

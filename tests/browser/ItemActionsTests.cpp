@@ -7,6 +7,7 @@
 #include "kit/views/Label.h"
 #include "kit/views/TextField.h"
 #include "kit/views/View.h"
+#include "preview/PreviewItemManager.h"
 #include "prompts/FilenamePrompt.h"
 #include "prompts/SimpleTextViewController.h"
 #include "screens/list/DocumentListAction.h"
@@ -283,6 +284,26 @@ TEST_F(ItemActionsTest, TheShareSheetPointsAtTheMiddleOfItsView)
     perform(DocumentListAction::Share, recipes);
     EXPECT_EQ(completions, 1) << "the list need not wait for the sheet";
     EXPECT_EQ(browser->documentInteractionController()->name(), "app.recipes");
+}
+
+TEST_F(ItemActionsTest, InfoShowsTheDetailsOfItsItem)
+{
+    const auto note = write("a.txt"), folder = url("Documents");
+    launch();
+    for (const auto& item : {note, folder}) {
+        perform(DocumentListAction::Info, item);
+        EXPECT_THAT(stack(), ElementsAre("BrindleDefault", "i"));
+        ASSERT_NE(browser->itemManager(), nullptr);
+        EXPECT_EQ(browser->itemManager()->item()->url(), item);
+        EXPECT_EQ(browser->itemManager()->mode(), PreviewModeDetails);
+        EXPECT_EQ(log->count("INFO Info action: " + logText(item)), 1);
+        browser->popViewController(false);
+        settle();
+    }
+    EXPECT_EQ(completions, 2);
+    perform(DocumentListAction::Info, url("gone.txt"));
+    EXPECT_EQ(stack().size(), 1);
+    EXPECT_EQ(completions, 3) << "the list is told in any case";
 }
 
 TEST_F(ItemActionsTest, WhatCannotBePerformedEndsAtOnce)

@@ -2,8 +2,11 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "kit/controllers/AlertController.h"
+#include "kit/controllers/BarButtonItem.h"
 #include "kit/views/Label.h"
+#include "kit/views/ListView.h"
 #include "kit/views/TextField.h"
+#include "prompts/DriveStatusLabelView.h"
 #include "prompts/FilenamePrompt.h"
 #include "prompts/SimpleTextViewController.h"
 #include "screens/list/DocumentListController.h"
@@ -68,6 +71,17 @@ protected:
     {
         cloud->token = std::nullopt;
         drive.notifications->post(Notification::CloudIdentityDidChange);
+    }
+    /// Answers the dimmed rows of the list on top by their names.
+    std::vector<std::string> dimmed() const
+    {
+        std::vector<std::string> names;
+        const auto& rows = *topList()->listView();
+        for (std::size_t row = 0; row < topList()->containedItemCount(); ++row) {
+            if (rows.row(row).isDimmed)
+                names.push_back(rows.row(row).title);
+        }
+        return names;
     }
     bool isThere(std::string_view path) const { return std::filesystem::exists(url(path).path()); }
 };
@@ -166,6 +180,60 @@ TEST_F(WaitingChangesTest, ASignOutEndsADeletionBetweenItsItems)
     EXPECT_EQ(waits, 2);
     EXPECT_EQ(finished, 1);
     EXPECT_EQ(alert(), nullptr) << "what was taken back has not failed";
+}
+
+TEST_F(WaitingChangesTest, ALongChangeSaysHowFarItIsAndCanBeCancelled)
+{
+    std::vector<Url> items;
+    for (const char* name : {"1.txt", "2.txt", "3.txt"})
+        items.push_back(write(name));
+    launch();
+    const auto atRest = topList()->toolbarItems();
+    const auto line = [this] {
+        const auto view =
+            std::dynamic_pointer_cast<DriveStatusLabelView>(topList()->toolbarItems()[1]->customView());
+        return view->primaryLabel()->text();
+    };
+    std::vector<std::string> lines;
+    coordinator->whileWaiting = [&] {
+        EXPECT_THAT(dimmed(), testing::ElementsAre("1.txt", "2.txt", "3.txt"));
+        dispatch->advance(0.4);
+        lines.push_back(line());
+        if (lines.size() == 3)
+            topList()->toolbarItems().back()->press();
+        dispatch->advance(0.2);
+        lines.push_back(line());
+    };
+    browser->moveItemsToDirectoryAndShowErrorsToDirectory(items, url("Documents"));
+    settle();
+    EXPECT_THAT(
+        lines, testing::ElementsAre(testing::StartsWith("5 items"), "0 of 3", "1 of 3", "Cancelling…"));
+    EXPECT_EQ(topList()->toolbarItems(), atRest);
+    EXPECT_TRUE(isThere("Documents/1.txt") && isThere("2.txt") && isThere("3.txt"));
+    EXPECT_EQ(alert(), nullptr);
+    EXPECT_THAT(dimmed(), testing::IsEmpty());
+}
+
+TEST_F(WaitingChangesTest, ListsThatComeMeanwhileShowTheProgressToo)
+{
+    const auto a = write("Folder/a.txt"), b = write("Folder/b.txt");
+    launch();
+    coordinator->whileWaiting = [&] {
+        dispatch->advance(1);
+        browser->beginEditMode(nullptr);
+        EXPECT_EQ(topList()->toolbarItems().size(), 5) << "the buttons of the selection";
+        browser->endEditMode(nullptr);
+        EXPECT_EQ(topList()->toolbarItems().size(), 4);
+        EXPECT_TRUE(browser->warpToFolderForURL(url("Folder/")));
+        dispatch->advance(1);
+        EXPECT_EQ(topList()->toolbarItems().size(), 4);
+        EXPECT_THAT(dimmed(), testing::Contains("b.txt"));
+        coordinator->whileWaiting = {};
+    };
+    browser->moveItemsToDirectoryAndShowErrorsToDirectory({a, b}, url("Documents"));
+    settle();
+    EXPECT_EQ(topList()->toolbarItems().size(), 3);
+    EXPECT_THAT(dimmed(), testing::IsEmpty());
 }
 
 } // namespace

@@ -31,6 +31,38 @@ TEST_F(DocumentList, ReportsWhatIsTapped)
         delegate->take(), (Lines{"folder Trip Trip", "item Notes.txt", "item Letter.pages", "item To"}));
 }
 
+TEST_F(DocumentList, DimsTheRowsOfItemsThatAreActedOnOrChanged)
+{
+    const auto folder = drive.makeFolder("Stuff");
+    const auto list = shownList(folder);
+    const auto a = drive.url("Stuff/a.txt"), b = drive.url("Stuff/b.txt");
+    list->setChangingItems({b});
+    deliver(list, {{"a.txt"}, {"b.txt"}, {"c.txt"}});
+    list->setAvailableActions(125);
+    const auto dimmed = [&] {
+        std::string rows;
+        for (std::size_t row = 0; row < 3; ++row)
+            rows += list->listView()->row(row).isDimmed ? '-' : 'o';
+        return rows;
+    };
+    EXPECT_EQ(dimmed(), "o-o") << "the change began before the rows came";
+    list->setChangingItems({a, drive.url("Other/c.txt")});
+    EXPECT_EQ(dimmed(), "-oo");
+    list->setChangingItems({});
+    EXPECT_EQ(dimmed(), "ooo");
+
+    list->listView()->commandRow(2, kit::RowCommand::Delete);
+    list->listView()->commandRow(2, kit::RowCommand::Rename);
+    list->setChangingItems({a});
+    EXPECT_EQ(dimmed(), "-o-");
+    ASSERT_EQ(delegate->completions.size(), 2);
+    delegate->completions[1]();
+    EXPECT_EQ(dimmed(), "-o-") << "one of two actions goes on";
+    delegate->completions[0]();
+    delegate->completions[0]();
+    EXPECT_EQ(dimmed(), "-oo");
+}
+
 TEST_F(DocumentList, OffersTheEnabledActionsByMenuAndKeys)
 {
     makePaintLibrary();

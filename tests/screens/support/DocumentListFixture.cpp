@@ -31,8 +31,9 @@ void RecordingListDelegate::documentListControllerURLWasRemoved(const List& list
 }
 
 void RecordingListDelegate::documentListControllerPerformActionURLOriginatingViewCompletion(
-    const List&, int action, const Url& url, const std::shared_ptr<kit::View>&, const Completion&)
+    const List&, int action, const Url& url, const std::shared_ptr<kit::View>&, const Completion& completion)
 {
+    completions.push_back(completion);
     _lines.push_back("action " + std::to_string(action) + " " + url.lastPathComponent());
 }
 

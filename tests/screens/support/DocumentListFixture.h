@@ -33,6 +33,7 @@ public:
 
     std::shared_ptr<kit::ViewController> preview; ///< the screen for a peek
     bool allowsEditing = false;
+    std::vector<Completion> completions; ///< those of the actions so far, which the test calls
 
 private:
     Lines _lines;
