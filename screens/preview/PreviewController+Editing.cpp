@@ -93,7 +93,8 @@ void PreviewController::editingBegan(const Result<Editing>& begun)
     _editor = PreviewEditor::create(editing, pages,
         {.present = weakly(this, &PreviewController::alert),
             .layoutDidChange = weakly(this, &PreviewController::showEditBars),
-            .done = weakly(this, &PreviewController::endEditing)});
+            .done = weakly(this, &PreviewController::endEditing),
+            .editedLate = weakly(this, &PreviewController::keepLate)});
     _edited.push_back(editing);
     auto& center = services().notificationCenter();
     _observations.clear();
@@ -193,6 +194,14 @@ void PreviewController::keep(const Editing& editing)
     if (!shouldSave(editing->item()))
         return askForUnsaved(editing);
     editing->save(weakly(this, &PreviewController::kept, editing));
+}
+
+/// Keeps an edit of a document that is not being changed any more.
+void PreviewController::keepLate(const Editing& editing)
+{
+    if (std::ranges::count(_edited, editing) == 0)
+        _edited.push_back(editing);
+    keep(editing);
 }
 
 void PreviewController::kept(const Editing& editing, const EditsKept& outcome)

@@ -120,6 +120,7 @@ private:
     void removeEditor();
     void leaveEditing(const std::optional<Url>& newItem = std::nullopt);
     void keep(const std::shared_ptr<PreviewEditing>& editing);
+    void keepLate(const std::shared_ptr<PreviewEditing>& editing);
     void kept(const std::shared_ptr<PreviewEditing>& editing, const EditsKept& outcome);
     using KeptHandler = void (PreviewController::*)(const std::shared_ptr<PreviewEditing>&, const EditsKept&);
     bool keepsRest(const std::shared_ptr<PreviewEditing>& editing, KeptHandler told);

@@ -137,6 +137,16 @@ void PreviewEditor::apply(PageEdit edit)
     update();
 }
 
+std::function<void(PageEdit)> PreviewEditor::applier()
+{
+    return [weak = weak_from_this(), editing = _editing, late = _callbacks.editedLate](PageEdit edit) {
+        if (const auto self = weak.lock())
+            return self->apply(std::move(edit));
+        editing->apply(std::move(edit), [](const auto&) {});
+        late(editing);
+    };
+}
+
 void PreviewEditor::undo()
 {
     if (!_editing->canUndo())
@@ -275,11 +285,9 @@ void PreviewEditor::fillIn(const FormField& field)
     if (field.kind == Kind::Choice)
         choose(field);
     else if (field.isMultiline)
-        askForText(
-            fieldName(field), field.text, weakly(this, [field](PreviewEditor& self, const std::string& text) {
-                if (text != field.text)
-                    self.apply(FieldTextEdit{field.page, field.id, text});
-            }));
+        askForText(fieldName(field), field.text, [field](const std::string& text) {
+            return text == field.text ? std::optional<PageEdit>() : FieldTextEdit{field.page, field.id, text};
+        });
     else if (field.kind == Kind::CheckBox)
         apply(FieldStateEdit{field.page, field.id, !field.isOn});
     else if (field.kind == Kind::RadioButton && !field.isOn)
@@ -298,8 +306,9 @@ void PreviewEditor::choose(const FormField& field)
             chosen.push_back(i);
         std::ranges::sort(chosen);
         sheet->addAction(alertAction((isChosen ? "✓ " : "") + field.options[i],
-            kit::AlertActionStyle::Default,
-            weakly(this, &PreviewEditor::apply, PageEdit(FieldChoiceEdit{field.page, field.id, chosen}))));
+            kit::AlertActionStyle::Default, [make = applier(), field, chosen] {
+                make(FieldChoiceEdit{field.page, field.id, chosen});
+            }));
     }
     if (field.takesOtherWords)
         sheet->addAction(alertAction(localized("Other…"), kit::AlertActionStyle::Default,
@@ -311,10 +320,9 @@ void PreviewEditor::choose(const FormField& field)
 
 void PreviewEditor::askForOtherWords(const FormField& field)
 {
-    askForText(
-        fieldName(field), field.text, weakly(this, [field](PreviewEditor& self, const std::string& text) {
-            self.apply(FieldTextEdit{field.page, field.id, text});
-        }));
+    askForText(fieldName(field), field.text, [field](const std::string& text) {
+        return std::optional<PageEdit>(FieldTextEdit{field.page, field.id, text});
+    });
 }
 
 void PreviewEditor::tapped(const PreviewPagesView::PagePlace& place)
@@ -344,23 +352,25 @@ void PreviewEditor::placeNote(const PreviewPagesView::PagePlace& place)
     const auto pages = _pages.lock();
     pages->setPlacing(false);
     _callbacks.layoutDidChange();
-    askForText(localized("Note"), {}, weakly(this, [place](PreviewEditor& self, const std::string& text) {
-        if (text.empty())
-            return;
+    askForText(localized("Note"), {}, [place](const std::string& text) {
         const Rect there{place.point.x - noteSide / 2, place.point.y - noteSide / 2, noteSide, noteSide};
-        self.apply(NewMarkEdit{place.page, PageMark::Kind::Note, {there}, text});
-    }));
+        return text.empty() ? std::optional<PageEdit>()
+                            : NewMarkEdit{place.page, PageMark::Kind::Note, {there}, text};
+    });
 }
 
-void PreviewEditor::askForText(
-    const std::string& title, const std::string& text, std::function<void(const std::string&)> written)
+void PreviewEditor::askForText(const std::string& title, const std::string& text,
+    std::function<std::optional<PageEdit>(const std::string&)> edit)
 {
     const auto alert = std::make_shared<kit::AlertController>(title, std::string(), kit::AlertStyle::Alert);
     const auto screen = std::make_shared<NoteScreen>(title, text);
     alert->setContentViewController(screen);
     alert->addAction(alertAction(localized("Cancel"), kit::AlertActionStyle::Cancel));
     const auto done = alertAction(localized("Done"), kit::AlertActionStyle::Default,
-        [note = screen->note(), written = std::move(written)] { written(note->text()); });
+        [note = screen->note(), edit = std::move(edit), make = applier()] {
+            if (auto made = edit(note->text()))
+                make(std::move(*made));
+        });
     alert->addAction(done);
     _callbacks.present(alert);
 }
@@ -376,19 +386,19 @@ void PreviewEditor::showMark(std::size_t page, const PageMark& mark)
         std::make_shared<kit::AlertController>(markTitle(mark), mark.text, kit::AlertStyle::Alert);
     alert->addAction(alertAction(mark.text.empty() ? localized("Add Comment") : localized("Change Text"),
         kit::AlertActionStyle::Default, weakly(this, &PreviewEditor::askForWords, page, mark)));
-    alert->addAction(alertAction(localized("Remove"), kit::AlertActionStyle::Destructive,
-        weakly(this, &PreviewEditor::apply, PageEdit(MarkRemoval{page, mark.id}))));
+    alert->addAction(alertAction(
+        localized("Remove"), kit::AlertActionStyle::Destructive, [make = applier(), page, id = mark.id] {
+            make(MarkRemoval{page, id});
+        }));
     alert->addAction(alertAction(localized("Cancel"), kit::AlertActionStyle::Cancel));
     _callbacks.present(alert);
 }
 
 void PreviewEditor::askForWords(std::size_t page, const PageMark& mark)
 {
-    askForText(
-        markTitle(mark), mark.text, weakly(this, [page, mark](PreviewEditor& self, const std::string& text) {
-            if (text != mark.text)
-                self.apply(MarkTextEdit{page, mark.id, text});
-        }));
+    askForText(markTitle(mark), mark.text, [page, mark](const std::string& text) {
+        return text == mark.text ? std::optional<PageEdit>() : MarkTextEdit{page, mark.id, text};
+    });
 }
 
 } // namespace screens

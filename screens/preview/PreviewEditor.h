@@ -9,6 +9,7 @@
 
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 
 namespace kit {
@@ -27,6 +28,8 @@ public:
         std::function<void(const std::shared_ptr<kit::ViewController>&)> present; ///< presents an alert
         std::function<void()> layoutDidChange; ///< the field's bar appeared or disappeared
         std::function<void()> done; ///< the user pressed Done
+        /// An alert was answered when this object had gone. The edit is made, but not saved.
+        std::function<void(const std::shared_ptr<PreviewEditing>&)> editedLate;
     };
     static std::shared_ptr<PreviewEditor> create(std::shared_ptr<PreviewEditing> editing,
         const std::shared_ptr<PreviewPagesView>& pages, Callbacks callbacks);
@@ -52,6 +55,8 @@ private:
     void connect();
     void use(EditTool tool);
     void apply(PageEdit edit);
+    /// Answers a function that makes an edit also when this object has gone.
+    std::function<void(PageEdit)> applier();
     void undo();
     void changed(const std::optional<Error>& error);
     void readFields();
@@ -66,8 +71,9 @@ private:
     void tapped(const PreviewPagesView::PagePlace& place);
     void fillIn(const FormField& field);
     void placeNote(const PreviewPagesView::PagePlace& place);
-    void askForText(
-        const std::string& title, const std::string& text, std::function<void(const std::string&)> written);
+    /// `edit` answers what is to be made of the text, or nothing.
+    void askForText(const std::string& title, const std::string& text,
+        std::function<std::optional<PageEdit>(const std::string&)> edit);
     void showMark(std::size_t page, const PageMark& mark);
     void askForWords(std::size_t page, const PageMark& mark);
 

@@ -257,6 +257,27 @@ TEST_F(PreviewEditingTest, WhatIsChangedWhileItIsSavedIntoACopyIsInThatCopy)
     }
 }
 
+TEST_F(PreviewEditingTest, ANoteThatWasBegunBeforeAnotherProgramSavedIsKept)
+{
+    show(formPdf());
+    pages().userResized(224, 1);
+    edit();
+    press(EditTool::Note);
+    pages().userTaps(pages().deck().toContent(0, {100, 150, 0, 0}).origin());
+    ASSERT_TRUE(alert());
+    drive.writeDocument("Form.pdf", testing_support::simplePdf({"theirs"}));
+    preview->refreshCurrentPreviewItem();
+    drive.dispatch->runUntilIdle();
+    EXPECT_FALSE(preview->editor()) << "nothing was changed yet";
+    writeNote("mine");
+    answer("Done");
+    ASSERT_TRUE(alert());
+    EXPECT_THAT(alert()->message(), HasSubstr("Form 2.pdf"));
+    const auto copy = services().pagedDocumentOpener().open(drive.url("Form 2.pdf").path());
+    ASSERT_TRUE(copy);
+    EXPECT_EQ((*copy)->marks(0).back().text, "mine");
+}
+
 TEST_F(PreviewEditingTest, ACopyHasANameThatIsNotTooLong)
 {
     std::string stem;
