@@ -7,16 +7,13 @@
 #include "items/FileUtils.h"
 #include "items/ItemChange.h"
 #include "items/UrlResolution.h"
-#include "platform/Dispatch.h"
 #include "platform/Log.h"
-#include "platform/Services.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
 
 namespace tarrow {
 
 using platform::Operation;
-using platform::services;
 using platform::Url;
 using screens::MoveTargetPicker;
 using screens::MoveTargetScope;

@@ -88,11 +88,12 @@ public:
         const auto index = static_cast<std::size_t>(page);
         const auto end = index + 1 < _pages.size() ? _pages[index + 1] : Page{_text.size(), 0};
         double y = 0;
-        auto [start, line] = _pages[index];
-        for (; start < _text.size() && Page{start, line} < end; start = paragraphAt(start).next, line = 0) {
-            const auto layout = layOut(start, paper);
-            const int last = start == end.paragraph ? end.line : pango_layout_get_line_count(layout.get());
-            for (; line < last; ++line) {
+        for (auto at = _pages[index]; at.paragraph < _text.size() && at < end;
+             at = {paragraphAt(at.paragraph).next, 0}) {
+            const auto layout = layOut(at.paragraph, paper);
+            const int last =
+                at.paragraph == end.paragraph ? end.line : pango_layout_get_line_count(layout.get());
+            for (int line = at.line; line < last; ++line) {
                 const auto extents = extentsOf(layout.get(), line);
                 cairo_move_to(cairo, 0, (y - extents.y) / PANGO_SCALE);
                 pango_cairo_show_layout_line(cairo, pango_layout_get_line_readonly(layout.get(), line));

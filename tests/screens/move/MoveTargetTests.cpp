@@ -28,7 +28,7 @@ struct RecordingPickerDelegate : MoveTargetPickerDelegate {
     }
     void documentTargetSelectionControllerWasCancelled(const std::shared_ptr<MoveTargetPicker>&) override
     {
-        lines.push_back("cancelled");
+        lines.emplace_back("cancelled");
     }
     Lines lines;
 };

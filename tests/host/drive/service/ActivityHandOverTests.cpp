@@ -223,7 +223,7 @@ TEST_F(HandOver, passesOverFilesThatAreNoRecords)
     const auto folder = drive.layout().activities();
     const auto text = record("device").toJson();
     write(record("good"));
-    std::ofstream(folder + "/empty.json");
+    std::ofstream(folder + "/empty.json") << "";
     std::ofstream(folder + "/damaged.json") << text.substr(0, text.size() / 2);
     std::ofstream(folder + "/renamed.json") << text;
     std::filesystem::create_symlink(folder + "/good.json", folder + "/device.json");

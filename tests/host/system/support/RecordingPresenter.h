@@ -30,7 +30,7 @@ public:
 
     std::optional<platform::Url> presentedItemURL() override { return url; }
     std::shared_ptr<platform::OperationQueue> presentedItemOperationQueue() override { return _queue; }
-    void presentedItemDidChange() override { heard.push_back("changed"); }
+    void presentedItemDidChange() override { heard.emplace_back("changed"); }
     void presentedItemWillMoveToURL(const platform::Url& to) override
     {
         heard.push_back("moves to " + to.path());
@@ -41,7 +41,7 @@ public:
     }
     void accommodatePresentedItemDeletionWithCompletionHandler(CompletionHandler completion) override
     {
-        heard.push_back("deletes");
+        heard.emplace_back("deletes");
         reply(std::move(completion));
     }
     void accommodatePresentedSubitemDeletionAtURLCompletionHandler(
