@@ -70,17 +70,15 @@ std::optional<Url> recentDocument(const PropertyDictionary& information)
     return archivedURL(information, platform::RecentDocumentURLKey);
 }
 
-/// Says why a URL from outside opened nothing.
-std::string refusal(const std::optional<SchemeEntry>& entry)
+/// Says why a location from outside opened nothing.
+std::string refusal(const Url& target)
 {
-    if (!entry || !entry->target)
-        return platform::localized("This address cannot be opened.");
     const auto& items = services().cloudDocumentService().items();
-    const auto name = screens::displayName(entry->target->lastPathComponent());
-    if (!items.isInDocumentsArea(*entry->target))
+    const auto name = screens::displayName(target.lastPathComponent());
+    if (!items.isInDocumentsArea(target))
         return platform::localized("“%@” lies outside the drive.", {name});
-    return items.isInTrash(*entry->target) ? platform::localized("“%@” was deleted", {name})
-                                           : platform::localized("“%@” is no longer there.", {name});
+    return items.isInTrash(target) ? platform::localized("“%@” was deleted", {name})
+                                   : platform::localized("“%@” is no longer there.", {name});
 }
 
 } // namespace
@@ -101,6 +99,13 @@ bool AppDelegate::warpTo(const std::optional<Url>& url, int previewMode)
 {
     const auto root = browser();
     return root && root->warpToNewURLPreviewMode(url, previewMode);
+}
+
+void AppDelegate::tell(const std::string& notice) const
+{
+    // While nobody is signed in, the screen says enough.
+    if (isSignedIn())
+        _rootWindow->showNotice(notice);
 }
 
 void AppDelegate::warpLater(const Url& url)
@@ -156,8 +161,9 @@ bool AppDelegate::applicationOpenURLOptions(
     op.info("openURL: %@, options %{public}@, app %{public}@", url, options, "Tarrow Drive");
     const auto entry = SchemeEntry::parse(url);
     const bool isShown = entry && warpTo(entry->target, entry->previewMode);
-    if (!isShown && isSignedIn())
-        _rootWindow->showNotice(refusal(entry));
+    const bool hasTarget = entry && entry->target;
+    if (!isShown)
+        tell(hasTarget ? refusal(*entry->target) : platform::localized("This address cannot be opened."));
     return isShown;
 }
 
@@ -182,10 +188,13 @@ void AppDelegate::openRecentDocument(const PropertyDictionary& information)
     static constexpr Operation op{
         "-[AppDelegate application:performActionForShortcutItem:completionHandler:]"};
     const auto url = recentDocument(information);
-    if (!url)
+    if (!url) {
+        tell(platform::localized("There is no recent document."));
         return;
+    }
     op.info("Shortcut recent document: %@", *url);
-    warpTo(url, PreviewModeQuick);
+    if (!warpTo(url, PreviewModeQuick))
+        tell(refusal(*url));
 }
 
 bool AppDelegate::applicationWillContinueUserActivityWithType(Application&, const std::string& type)

@@ -56,6 +56,8 @@ private:
     void dumpWindowInfo() const;
     bool warpTo(const std::optional<platform::Url>& url, int previewMode);
     void warpLater(const platform::Url& url);
+    /// Tells the user why nothing was opened.
+    void tell(const std::string& notice) const;
     void openRecentDocument(const platform::PropertyDictionary& information);
     void continueSearch(const platform::UserActivity& activity);
     void openSearchResult(const platform::UserActivity& activity);

@@ -6,6 +6,7 @@
 #include "host/drive/service/LocalActivityHandOver.h"
 #include "host/drive/service/LocalCloudDocumentService.h"
 #include "host/gtk/app/DesktopSharing.h"
+#include "host/gtk/app/DesktopShortcuts.h"
 #include "host/gtk/app/LaunchContext.h"
 #include "host/gtk/app/MakeApplication.h"
 #include "host/gtk/preview/PreviewModule.h"
@@ -119,6 +120,7 @@ DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale)
         host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination(),
             .root = cloud->layout().documents(),
             .dispatch = set.dispatch});
+    set.launcherShortcuts = std::make_shared<host::gtk::DesktopShortcuts>(cloud->layout().recentDocument());
     set.storageOfferManager = cloud->storageOffers();
     set.keyValueStore = cloud->keyValueStore();
     set.userDefaults =

@@ -191,6 +191,9 @@ bool NavController::warpToNewURLPreviewMode(const std::optional<Url>& url, int m
     const bool warped = manager->warpToNewURL(resolved);
     if (!warped)
         op.warning("warpToNewURL failed: %@", resolved);
+    const auto item = manager->item();
+    if (warped && item && !item->isDirectory())
+        _recentDocument.opened(*item);
     return warped;
 }
 
@@ -286,6 +289,7 @@ void NavController::openFolder(const Url& url, const Operation& op)
 
 void NavController::openDocument(const std::shared_ptr<DRItem>& item, const Operation& op)
 {
+    _recentDocument.opened(*item);
     if (LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(item->url(), topViewController(), true)) {
         op.debug("openInDefaultApp returned YES, app launched");
         return;
@@ -359,6 +363,7 @@ void NavController::knopPopToURL(const Url& url)
         openFolder(item->url(), op);
         return;
     }
+    _recentDocument.opened(*item);
     if (LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(item->url(), topViewController(), true)) {
         op.debug("openInDefaultApp returned YES, app launched");
         return;

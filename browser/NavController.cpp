@@ -163,6 +163,7 @@ void NavController::handleAccountChanges()
     }
     op.info("Tarrow Token Changed, enabled=%{public}@, reinitializing view", token ? "YES" : "NO");
     saveTarrowToken(token);
+    RecentDocument::forget();
     endEverythingPresented();
     _editMode = false;
     setupInitialViewController();

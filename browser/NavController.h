@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "browser/RecentDocument.h"
 #include "items/AccountSession.h"
 #include "kit/controllers/NavigationController.h"
 #include "platform/Date.h"
@@ -257,6 +258,7 @@ private:
     std::shared_ptr<screens::UpgradeFlow> _upgradeFlowMgr;
     std::shared_ptr<const platform::StorageOffer> _upgradeOffer;
     std::uint64_t _quotaBytes = 0;
+    RecentDocument _recentDocument;
     std::optional<AccountSession> _moveAsked; ///< who was asked last for the destination of a move
     std::shared_ptr<RunningChanges> _runningChanges; ///< null before the first change
     std::vector<platform::Observation> _observations;

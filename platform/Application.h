@@ -24,8 +24,9 @@ struct LaunchOptions {
 };
 
 /// Hears of the application's life and of everything that enters it from outside. All calls come on the main
-/// thread. A launch calls, in this order: will-finish-launching, should-restore (when there is saved state),
-/// did-finish-launching, and then whatever the launch was asked to show.
+/// thread. A launch calls, in this order: will-finish-launching, should-restore (when there is saved state,
+/// and no shortcut that must not be covered by it), did-finish-launching, and then whatever the launch was
+/// asked to show.
 class ApplicationDelegate {
 public:
     using ShortcutCompletion = std::function<void(bool)>;

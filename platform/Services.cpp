@@ -16,6 +16,7 @@
 #include "platform/Formatters.h"
 #include "platform/ImageLoader.h"
 #include "platform/KeyValueStore.h"
+#include "platform/LauncherShortcuts.h"
 #include "platform/LinkOpener.h"
 #include "platform/Localization.h"
 #include "platform/NameSearch.h"

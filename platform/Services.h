@@ -21,6 +21,7 @@ class Formatters;
 class ImageLoader;
 class KeyValueStore;
 class KeyedArchiver;
+class LauncherShortcuts;
 class LinkOpener;
 class Localization;
 class NameSearch;
@@ -63,6 +64,8 @@ struct ServiceSet {
     std::shared_ptr<KeyValueStore> keyValueStore;
     /// Values as data that can be stored.
     std::shared_ptr<KeyedArchiver> keyedArchiver;
+    /// What the launcher offers of this program.
+    std::shared_ptr<LauncherShortcuts> launcherShortcuts;
     /// The person's web browser.
     std::shared_ptr<LinkOpener> linkOpener;
     /// Texts in the user's language.
@@ -109,6 +112,7 @@ public:
     ImageLoader& imageLoader() const { return *_set.imageLoader; }
     KeyValueStore& keyValueStore() const { return *_set.keyValueStore; }
     KeyedArchiver& keyedArchiver() const { return *_set.keyedArchiver; }
+    LauncherShortcuts& launcherShortcuts() const { return *_set.launcherShortcuts; }
     LinkOpener& linkOpener() const { return *_set.linkOpener; }
     Localization& localization() const { return *_set.localization; }
     NameSearch& nameSearch() const { return *_set.nameSearch; }

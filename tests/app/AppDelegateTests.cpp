@@ -6,6 +6,7 @@
 #include "host/drive/identity/Bookmark.h"
 #include "host/drive/identity/DocumentIndex.h"
 #include "host/drive/records/ItemFacts.h"
+#include "items/FileUtils.h"
 #include "items/Settings.h"
 #include "kit/controllers/SearchPresentation.h"
 #include "kit/controllers/Window.h"
@@ -238,6 +239,7 @@ TEST_F(AppDelegateTest, ARecentDocumentIsLookedForInThreeWaysInTurn)
     for (const auto& row : rows) {
         SCOPED_TRACE(row.name);
         launchApplication();
+        watch(*app->rootWindow());
         choose(platform::ShortcutTypeRecentDocument, row.information);
         if (*row.expected) {
             EXPECT_THAT(stack(), ElementsAre(top, "*"));
@@ -245,8 +247,30 @@ TEST_F(AppDelegateTest, ARecentDocumentIsLookedForInThreeWaysInTurn)
             EXPECT_EQ(browser->itemManager()->item()->url(), url(row.expected));
         } else {
             EXPECT_THAT(stack(), ElementsAre(top));
+            EXPECT_THAT(takeNotices(), ElementsAre("There is no recent document."));
         }
     }
+}
+
+TEST_F(AppDelegateTest, TheRecentDocumentIsTheOneThatWasOpenedLast)
+{
+    write("first.txt");
+    write("Folder/second.txt");
+    launchApplication();
+    post(platform::Notification::ApplicationDidBecomeActive);
+    EXPECT_TRUE(open(schemeURL("first.txt")) && open(schemeURL("Folder/second.txt")));
+    EXPECT_FALSE(FileUtils::moveTo(url("Folder/second.txt"), url("moved.txt")));
+    settle();
+    const LaunchOptions options{shortcuts->recentDocument()};
+    launchApplication(options);
+    EXPECT_THAT(stack(), ElementsAre(top, "*"));
+    EXPECT_EQ(browser->itemManager()->item()->url(), url("moved.txt"));
+
+    EXPECT_FALSE(FileUtils::remove(url("moved.txt")));
+    launchApplication();
+    watch(*app->rootWindow());
+    choose(options.shortcutItem->type, options.shortcutItem->userInfo);
+    EXPECT_THAT(takeNotices(), ElementsAre("There is no recent document."));
 }
 
 TEST_F(AppDelegateTest, OtherShortcutsDoNothing)

@@ -206,6 +206,53 @@ TEST_F(NavigationTest, ARemovedFolderIsLeft)
     EXPECT_THAT(takeNotices(), ElementsAre("“Folder” is no longer there."));
 }
 
+TEST_F(NavigationTest, AnOpenedDocumentIsKeptForTheLauncher)
+{
+    const auto note = write("note.txt");
+    write("Folder/a.txt");
+    const auto reference = drive.writeReference("pointer.trwref", "BrindleDefault", "Folder/a.txt");
+    launch();
+    post(platform::Notification::ApplicationDidBecomeActive);
+    const auto peek = [&](const Url& item) {
+        browser->documentListControllerViewControllerForPreviewingItemAtURL(topList(), item);
+    };
+    peek(note);
+    browser->documentListControllerPerformActionURL(
+        topList(), static_cast<int>(DocumentListAction::Info), note);
+    warp("Folder");
+    EXPECT_THAT(shortcuts->documents, testing::IsEmpty()) << "no document was opened yet";
+
+    const std::function<void()> ways[] = {[&] { tap(note); }, [&] { warp("note.txt"); },
+        [&] { peek(note), browser->knopPopToURL(note); },
+        [&] {
+            apps->available = {{"Owner", {SimulatedApps::make("editor")}}};
+            tap(note);
+            EXPECT_THAT(apps->opened, testing::SizeIs(1));
+            apps->available.clear();
+        }};
+    const auto has = [this](std::string_view key) {
+        return shortcuts->kept->userInfo.contains(std::string(key));
+    };
+    for (const auto& way : ways) {
+        browser->popToRootViewController(false);
+        settle();
+        shortcuts->documents.clear();
+        way();
+        settle();
+        EXPECT_THAT(shortcuts->documents, ElementsAre(note));
+        EXPECT_TRUE(has(platform::RecentDocumentDocIDKey) && has(platform::RecentDocumentURLKey));
+        EXPECT_FALSE(has(platform::RecentDocumentAliasURLKey)) << "an alias would win over the identifier";
+    }
+    tap(reference);
+    EXPECT_THAT(shortcuts->documents, ElementsAre(note, url("Folder/a.txt")));
+    EXPECT_TRUE(has(platform::RecentDocumentAliasURLKey));
+
+    tap(note);
+    cloud->token = platform::PropertyValue("account-2");
+    post(platform::Notification::CloudIdentityDidChange);
+    EXPECT_EQ(shortcuts->kept, std::nullopt) << "it was the document of another account";
+}
+
 TEST_F(NavigationTest, APeekShowsFoldersAndDocuments)
 {
     write("Folder/note.txt");

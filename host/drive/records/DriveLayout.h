@@ -48,6 +48,7 @@ public:
     std::string defaults() const { return _state + "/defaults.json"; }
     std::string device() const { return _state + "/device"; } ///< this device's identifier
     std::string interfaceState() const { return _state + "/interface.json"; }
+    std::string recentDocument() const { return _state + "/recent-document.json"; }
 
     std::string container(std::string_view identifier) const;
     /// Answers the documents folder of a container.

@@ -48,6 +48,8 @@ CommandLine CommandLine::parse(int argc, const char* const* argv)
             if (i + 1 < argc)
                 search.query = argv[++i];
             line.requests.emplace_back(std::move(search));
+        } else if (argument == "--recent") {
+            line.requests.emplace_back(OpenRecentDocument{});
         } else {
             return invalid(argument);
         }
@@ -63,8 +65,10 @@ std::string CommandLine::helpText()
         return text + platform::localized(meaning) + "\n";
     };
     return platform::localized("Usage:") + " tarrow-drive [URL...]\n"
-        + option("URL", "Show a document of the drive") + option("--search [QUERY]", "Search the drive")
-        + option("--help", "Show this help") + option("--version", "Show the version");
+        + option("URL", "Show a document of the drive")
+        + option("--recent", "Show the document that was opened last")
+        + option("--search [QUERY]", "Search the drive") + option("--help", "Show this help")
+        + option("--version", "Show the version");
 }
 
 } // namespace host::gtk

@@ -19,7 +19,11 @@ struct OpenSearch {
     std::optional<std::string> query; ///< absent: the search shortcut
     bool operator==(const OpenSearch&) const = default;
 };
-using LaunchRequest = std::variant<OpenUrl, OpenSearch>;
+/// The launcher's shortcut to the document that was opened last.
+struct OpenRecentDocument {
+    bool operator==(const OpenRecentDocument&) const = default;
+};
+using LaunchRequest = std::variant<OpenUrl, OpenSearch, OpenRecentDocument>;
 
 /// The program's arguments.
 struct CommandLine {

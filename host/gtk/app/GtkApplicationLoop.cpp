@@ -9,6 +9,8 @@
 #include "kit/controllers/AlertController.h"
 #include "kit/controllers/InterfaceState.h"
 #include "kit/controllers/ViewController.h"
+#include "platform/DocumentSharing.h"
+#include "platform/LauncherShortcuts.h"
 #include "platform/Localization.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Services.h"
@@ -112,13 +114,28 @@ ShortcutItem searchShortcut()
     return {std::string(platform::ShortcutTypeSearch), {}};
 }
 
-ShortcutItem recentDocumentShortcut(const std::string& url)
+/// Answers the shortcut that was kept, or one without a document, for which the delegate says that there is
+/// none.
+ShortcutItem recentDocumentShortcut()
 {
-    ShortcutItem shortcut{std::string(platform::ShortcutTypeRecentDocument), {}};
-    if (const auto parsed = platform::Url::parse(url))
-        shortcut.userInfo.insert_or_assign(std::string(platform::RecentDocumentURLKey),
-            platform::services().keyedArchiver().archive(*parsed));
-    return shortcut;
+    return platform::services().launcherShortcuts().recentDocument().value_or(
+        ShortcutItem{std::string(platform::ShortcutTypeRecentDocument), {}});
+}
+
+/// Answers the launcher's shortcut for which a request stands; nothing for every other request.
+std::optional<ShortcutItem> shortcutOf(const LaunchRequest& request)
+{
+    if (request == LaunchRequest(OpenSearch()))
+        return searchShortcut();
+    return std::holds_alternative<OpenRecentDocument>(request) ? std::optional(recentDocumentShortcut())
+                                                               : std::nullopt;
+}
+
+/// Other programs name the drive's documents by their files.
+std::string schemeUrl(const std::string& url)
+{
+    const auto parsed = platform::Url::parse(url);
+    return parsed && parsed->isFileURL() ? platform::linkToItem(*parsed) : url;
 }
 
 bool hasDisplayVariable()
@@ -262,8 +279,7 @@ void GtkApplicationLoop::addActions()
     add(ActionNames::openUrl, G_VARIANT_TYPE_STRING,
         [this](GVariant* url) { handle(OpenUrl{g_variant_get_string(url, nullptr)}); });
     add(ActionNames::search, nullptr, [this](GVariant*) { handle(OpenSearch()); });
-    add(ActionNames::recentDocument, G_VARIANT_TYPE_STRING,
-        [this](GVariant* url) { perform(recentDocumentShortcut(g_variant_get_string(url, nullptr))); });
+    add(ActionNames::recentDocument, nullptr, [this](GVariant*) { handle(OpenRecentDocument()); });
     add(ActionNames::continueActivity, G_VARIANT_TYPE_VARDICT,
         [this](GVariant* activity) { continueActivity(activityOf(activity)); });
 }
@@ -273,10 +289,8 @@ void GtkApplicationLoop::addActions()
 void GtkApplicationLoop::launch(std::optional<ShortcutItem> shortcut)
 {
     auto waiting = std::exchange(_waiting, {});
-    if (!shortcut && !waiting.empty() && waiting.front() == LaunchRequest(OpenSearch())) {
-        shortcut = searchShortcut();
+    if (!shortcut && !waiting.empty() && (shortcut = shortcutOf(waiting.front())))
         waiting.erase(waiting.begin());
-    }
     gtk_widget_set_default_direction(
         platform::services().localization().isRightToLeft() ? GTK_TEXT_DIR_RTL : GTK_TEXT_DIR_LTR);
     auto size = storedSize(_stateFile);
@@ -291,7 +305,9 @@ void GtkApplicationLoop::launch(std::optional<ShortcutItem> shortcut)
     _delegate = _makeDelegate();
     const platform::LaunchOptions options{shortcut};
     const bool remains = _delegate->applicationWillFinishLaunchingWithOptions(*this, options);
-    restoreState();
+    // A restored preview would cover what the shortcut shows.
+    if (!shortcut)
+        restoreState();
     _delegate->applicationDidFinishLaunchingWithOptions(*this, options);
     activeChanged(true);
     if (shortcut && remains)
@@ -316,13 +332,14 @@ void GtkApplicationLoop::windowShown(WindowPeer& window)
 void GtkApplicationLoop::handle(const LaunchRequest& request)
 {
     if (const auto* open = std::get_if<OpenUrl>(&request)) {
-        openUrl(open->url);
-    } else if (const auto& query = std::get<OpenSearch>(request).query) {
-        UserActivity activity{std::string(platform::activityType::queryContinuation), {}};
-        activity.userInfo.insert_or_assign(std::string(platform::activityKey::searchQuery), *query);
-        continueActivity(activity);
+        openUrl(schemeUrl(open->url));
+    } else if (const auto shortcut = shortcutOf(request)) {
+        perform(*shortcut);
     } else {
-        perform(searchShortcut());
+        UserActivity activity{std::string(platform::activityType::queryContinuation), {}};
+        activity.userInfo.insert_or_assign(
+            std::string(platform::activityKey::searchQuery), *std::get<OpenSearch>(request).query);
+        continueActivity(activity);
     }
 }
 

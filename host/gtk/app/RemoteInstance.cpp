@@ -58,11 +58,14 @@ GVariant* actionCall(const LaunchRequest& request)
     GVariantBuilder parameters;
     g_variant_builder_init(&parameters, G_VARIANT_TYPE("av"));
     const char* action = ActionNames::openUrl;
-    if (const auto* open = std::get_if<OpenUrl>(&request)) {
-        g_variant_builder_add(&parameters, "v", g_variant_new_string(open->url.c_str()));
+    const auto add = [&](GVariant* parameter) { g_variant_builder_add(&parameters, "v", parameter); };
+    if (std::holds_alternative<OpenRecentDocument>(request)) {
+        action = ActionNames::recentDocument;
+    } else if (const auto* open = std::get_if<OpenUrl>(&request)) {
+        add(g_variant_new_string(open->url.c_str()));
     } else if (const auto& query = std::get<OpenSearch>(request).query) {
         action = ActionNames::continueActivity;
-        g_variant_builder_add(&parameters, "v", queryActivity(*query));
+        add(queryActivity(*query));
     } else {
         action = ActionNames::search;
     }

@@ -27,7 +27,7 @@ namespace ActionNames {
 
 inline constexpr const char* openUrl = "open-url"; ///< s: the URL
 inline constexpr const char* search = "search"; ///< no parameter: the launcher's shortcut
-inline constexpr const char* recentDocument = "recent-document"; ///< s: the document's URL
+inline constexpr const char* recentDocument = "recent-document"; ///< no parameter: the launcher's shortcut
 inline constexpr const char* continueActivity =
     "continue-activity"; ///< a{sv}: "type", and the user information
 

@@ -46,6 +46,7 @@ BrowserFixture::BrowserFixture()
     set.documentSharing = std::make_shared<RecordingSharing>();
     set.localization = std::make_shared<host::system::GettextLocalization>(
         TRW_LOCALE_FOLDER, host::system::UserLocale{"en", "en_US"});
+    set.launcherShortcuts = shortcuts;
     set.storageOfferManager = offers;
     platform::installServices(std::move(set));
 }

@@ -10,6 +10,7 @@
 #include "preview/PreviewMode.h"
 #include "tests/support/DriveFixture.h"
 #include "tests/support/ForwardingCoordinator.h"
+#include "tests/support/RecordingShortcuts.h"
 #include "tests/support/SimulatedApps.h"
 #include "tests/support/SimulatedCloud.h"
 #include "tests/support/SimulatedOffers.h"
@@ -94,6 +95,7 @@ protected:
     std::shared_ptr<InterruptedCoordinator> coordinator;
     std::shared_ptr<SimulatedCloud> cloud;
     std::shared_ptr<SimulatedApps> apps = std::make_shared<SimulatedApps>();
+    std::shared_ptr<RecordingShortcuts> shortcuts = std::make_shared<RecordingShortcuts>();
     std::shared_ptr<SimulatedOffers> offers = std::make_shared<SimulatedOffers>();
     std::shared_ptr<ShownNotices> notices;
     std::shared_ptr<kit::Window> window;
