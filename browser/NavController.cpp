@@ -246,6 +246,8 @@ void NavController::decodeRestorableStateWithCoder(const platform::StateCoder& c
     const auto item = url ? DRItem::initWithURL(*url) : nullptr;
     if (!item || item->isDirectory())
         return;
+    // The folder comes first, so that going back from the preview leads to it.
+    warpToFolderForURL(*url);
     const auto* mode = coder.decode(stateModeKey);
     const auto integer = mode ? mode->asInteger() : std::nullopt;
     showPreviewPreviewMode(item, static_cast<int>(integer.value_or(PreviewModeQuick)));

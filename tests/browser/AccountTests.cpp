@@ -145,7 +145,10 @@ TEST_F(AccountTest, SavedStateBringsThePreviewBack)
     ASSERT_NE(browser->itemManager(), nullptr);
     EXPECT_EQ(browser->itemManager()->mode(), PreviewModeDetails);
     EXPECT_EQ(browser->itemManager()->item()->url(), url("Folder/note.txt"));
-    EXPECT_EQ(browser->viewControllers().size(), 2);
+    EXPECT_THAT(stack(), ElementsAre("BrindleDefault", "Folder", "i"));
+    browser->popViewController(false);
+    settle();
+    EXPECT_EQ(topList()->containedItemCount(), 1U) << "the way back leads to the document's folder";
 }
 
 TEST_F(AccountTest, StateThatNoLongerFitsIsNotRestored)
