@@ -123,7 +123,9 @@ void NavController::documentListControllerPerformActionURLOriginatingViewComplet
     case DocumentListAction::Move:
         op.userAction("DLC Action Move");
         op.info("Move action: %@", url);
-        showMoveTargetForItemsInFolder({url}, list ? list->presentedURL() : std::nullopt);
+        // What a search found lies in another folder than the list's.
+        showMoveTargetForItemsInFolder(
+            {url}, list && !isSearchPresented() ? list->presentedURL() : url.deletingLastPathComponent());
         break;
     case DocumentListAction::PressurePop:
         op.userAction("DLC Action Firmtap Pop");

@@ -205,12 +205,21 @@ bool NavController::warpToFolderForURL(const Url& url)
     return stack.has_value();
 }
 
+/// Ends edit mode before a search, because its results could not be opened.
+void NavController::endChoiceOfItems()
+{
+    if (_editMode)
+        setEditModeAndUpdateUIForViewController(false, getTopDocumentListController());
+}
+
 void NavController::startSearch(const std::string& query)
 {
     endEverythingPresented();
+    endChoiceOfItems();
     popToRootViewController(false);
     auto& dispatch = services().dispatch();
     dispatch.after(searchDelay, dispatch.mainQueue(), weakly(this, [query](NavController& self) {
+        self.endChoiceOfItems();
         if (const auto list = self.getTopDocumentListController())
             list->startSearchWithQueryStringBecomeFirstResponder(query, true);
     }));
@@ -341,12 +350,21 @@ NavController::Screen NavController::documentListControllerViewControllerForPrev
     if (values && (values->flag(AttributeKey::IsPackage) || values->flag(AttributeKey::IsRegularFile))) {
         completeTransition();
         _itemManager = PreviewItemManager::newItemManagerWithModeNavController(PreviewModeQuick, self());
+        _peekManager = _itemManager;
         return _itemManager->prepareToPreviewItem(DRItem::initWithURL(url));
     }
     if (values && values->flag(AttributeKey::IsDirectory))
         return PeekFolderViewController::initWithURL(url);
     op.debug("URL is not a regular file, package, or folder");
     return nullptr;
+}
+
+void NavController::documentListControllerPeekDidEnd(const List&)
+{
+    // A pop has put the preview on the stack, and any other preview has a manager of its own.
+    const bool isStillPeeks = _itemManager && _itemManager == _peekManager.lock();
+    if (isStillPeeks && getTopDocumentListController())
+        dropItemManager();
 }
 
 void NavController::knopPopToURL(const Url& url)
@@ -370,8 +388,13 @@ void NavController::knopPopToURL(const Url& url)
     }
     op.debug("openInDefaultApp returned NO, showing cached Lookwell from Knop");
     const auto preview = _itemManager ? _itemManager->currentLookwellController() : nullptr;
-    if (searching)
+    if (searching) {
+        // The folder's list would drop the manager, which only the browser owns.
+        const auto manager = std::exchange(_itemManager, nullptr);
         warpToFolderForURL(url);
+        completeTransition();
+        _itemManager = manager;
+    }
     if (preview)
         pushViewController(preview, true);
 }

@@ -150,7 +150,7 @@ public:
     bool warpToFolderForURL(const platform::Url& url);
     /// Shows an item in a preview; null does nothing.
     void showPreviewPreviewMode(const std::shared_ptr<DRItem>& item, int mode);
-    /// Goes back to the top level and opens its search field with a query.
+    /// Goes back to the top level, ends the choice of items and opens the search field with a query.
     void startSearch(const std::string& query);
     /// Opens the item of a peek.
     void knopPopToURL(const platform::Url& url);
@@ -164,6 +164,7 @@ public:
     void documentListControllerRequestsEditing(const List& list) override;
     Screen documentListControllerViewControllerForPreviewingItemAtURL(
         const List& list, const platform::Url& url) override;
+    void documentListControllerPeekDidEnd(const List& list) override;
     void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,
         const platform::Url& url, const std::shared_ptr<kit::View>& originatingView,
         const Completion& completion) override;
@@ -222,6 +223,7 @@ private:
     /// Tells the user of something that needs no answer.
     void tell(const std::string& notice) const;
     bool isSearchPresented() const;
+    void endChoiceOfItems();
     void showVanishedItem(const platform::Url& url);
     void openFolder(const platform::Url& url, const platform::Operation& op);
     void openDocument(const std::shared_ptr<DRItem>& item, const platform::Operation& op);
@@ -253,6 +255,7 @@ private:
     std::optional<platform::Date> _lastQuotaFetch;
     std::shared_ptr<QuotaFetcher> _quotaFetcher;
     std::shared_ptr<PreviewItemManager> _itemManager;
+    std::weak_ptr<PreviewItemManager> _peekManager; ///< the manager of the latest peek
     std::shared_ptr<FilenamePrompt> _folderPromptAlert;
     Completion _performActionCompletionBlock;
     std::shared_ptr<screens::UpgradeFlow> _upgradeFlowMgr;

@@ -15,6 +15,7 @@
 #include "screens/ErrorWords.h"
 #include "screens/list/DocumentPeek.h"
 #include "screens/list/DocumentRowSource.h"
+#include "screens/list/DocumentSearch.h"
 #include "screens/list/FolderContents.h"
 
 #include <algorithm>
@@ -40,6 +41,14 @@ constexpr ActionEntry menuEntries[] = {
     {DocumentListAction::More, "More", kit::MenuActionStyle::Default, true},
     {DocumentListAction::Delete, "Delete", kit::MenuActionStyle::Destructive, true},
 };
+
+bool holds(const DocumentRows& rows, const Url& url)
+{
+    const auto has = [&](const kit::RowId id) {
+        return std::ranges::find(rows.ids(), id) != rows.ids().end();
+    };
+    return has(rows.idFor(url)) || has(DocumentRows::idForExtraItem(url));
+}
 
 } // namespace
 
@@ -140,19 +149,32 @@ void DocumentListController::open(const Url& url, FolderEntryKind kind)
         told->documentListControllerDidSelectItemAtURL(self(), url);
 }
 
+std::optional<RowItem> DocumentListController::itemAt(std::size_t index) const
+{
+    const auto& rows = _rows->rows();
+    if (!rows || index >= rows->count())
+        return std::nullopt;
+    const auto entry = rows->entry(index);
+    return RowItem{rows->url(index), entry.kind, entry.isPromise, _listView->row(index).title};
+}
+
 kit::Menu DocumentListController::menuForRow(kit::ListView&, std::size_t index)
 {
+    const auto item = itemAt(index);
+    return item ? menuFor(*item) : kit::Menu();
+}
+
+kit::Menu DocumentListController::menuFor(const RowItem& item)
+{
     kit::Menu menu;
-    const auto rows = _rows->rows();
-    if (_editing || !rows || index >= rows->count())
+    if (_editing)
         return menu;
-    const auto kind = rows->entry(index).kind;
-    if (rows->entry(index).isPromise)
-        menu.push_back(downloadEntry(rows->url(index)));
+    if (item.isPromise)
+        menu.push_back(downloadEntry(item.url));
     for (const auto& entry : menuEntries) {
-        if (!offers(entry.action, kind))
+        if (!offers(entry.action, item.kind))
             continue;
-        auto chosen = weakly(this, &DocumentListController::perform, entry.action, rows->url(index));
+        auto chosen = weakly(this, &DocumentListController::perform, entry.action, item.url);
         menu.push_back({.title = localized(entry.title),
             .handler = std::move(chosen),
             .style = entry.style,
@@ -229,17 +251,13 @@ void DocumentListController::dimBusyRows()
 
 std::shared_ptr<kit::View> DocumentListController::anchorFor(const Url& url)
 {
-    const auto rows = _rows->rows();
-    const auto [first, count] = _listView->visibleRows();
-    for (std::size_t index = first; rows && index < std::min(first + count, rows->count()); ++index) {
-        if (rows->url(index) != url)
-            continue;
-        const double top = static_cast<double>(index) * _listView->rowHeight() - _listView->contentOffset().y;
-        const auto& list = _listView->frame();
-        _rowAnchor->setFrame({list.x, list.y + top, list.width, _listView->rowHeight()});
-        return _rowAnchor;
-    }
-    return _listView;
+    if (isSearching())
+        return _search->anchorFor(url);
+    const auto place = _rows->visiblePlaceOf(url);
+    if (!place)
+        return _listView;
+    _rowAnchor->setFrame(*place);
+    return _rowAnchor;
 }
 
 bool DocumentListController::offers(DocumentListAction action, FolderEntryKind kind) const
@@ -250,10 +268,16 @@ bool DocumentListController::offers(DocumentListAction action, FolderEntryKind k
     return isForKind && (_availableActions & actionBit(action)) != 0;
 }
 
-bool DocumentListController::rowCommand(kit::ListView& list, std::size_t index, kit::RowCommand command)
+bool DocumentListController::rowCommand(kit::ListView&, std::size_t index, kit::RowCommand command)
+{
+    const auto item = itemAt(index);
+    return item && obey(command, *item);
+}
+
+bool DocumentListController::obey(kit::RowCommand command, const RowItem& item)
 {
     if (command == kit::RowCommand::Peek)
-        return rowHeld(list, index);
+        return peekAt(item);
     constexpr std::pair<kit::RowCommand, DocumentListAction> actions[] = {
         {kit::RowCommand::Rename, DocumentListAction::Rename},
         {kit::RowCommand::Delete, DocumentListAction::Delete},
@@ -261,47 +285,58 @@ bool DocumentListController::rowCommand(kit::ListView& list, std::size_t index, 
     };
     const auto* action =
         std::ranges::find(actions, command, &std::pair<kit::RowCommand, DocumentListAction>::first);
-    const auto rows = _rows->rows();
-    if (action == std::end(actions) || !rows || index >= rows->count()
-        || !offers(action->second, rows->entry(index).kind))
+    if (action == std::end(actions) || !offers(action->second, item.kind))
         return false;
-    perform(action->second, rows->url(index));
+    perform(action->second, item.url);
     return true;
 }
 
-bool DocumentListController::rowHeld(kit::ListView& list, std::size_t index)
+bool DocumentListController::rowHeld(kit::ListView&, std::size_t index)
+{
+    const auto item = itemAt(index);
+    return item && peekAt(*item);
+}
+
+bool DocumentListController::peekAt(const RowItem& item)
 {
     const auto told = delegate();
-    const auto rows = _rows->rows();
-    if (!told || _editing || !rows || index >= rows->count())
+    if (!told || _editing)
         return false;
-    const auto url = rows->url(index);
-    const auto screen = told->documentListControllerViewControllerForPreviewingItemAtURL(self(), url);
+    const auto screen = told->documentListControllerViewControllerForPreviewingItemAtURL(self(), item.url);
     if (!screen)
         return false;
-    const auto open = weakly(this, &DocumentListController::openFromPeek, url, rows->entry(index).kind);
-    const auto title = _listView->row(index).title;
-    const auto peek = DocumentPeek::make(title, screen, menuForRow(list, index), open);
+    const auto peek = DocumentPeek::make(item.title, screen, menuFor(item),
+        {.open = weakly(this, &DocumentListController::openFromPeek, item.url, item.kind),
+            .ended = weakly(this, &DocumentListController::peekEnded)});
     _peek = peek;
-    _peekedItem = url;
+    _peekedItem = item.url;
     presentViewController(peek, true);
     return true;
 }
 
-void DocumentListController::heldRowPressedOn(kit::ListView&)
+std::shared_ptr<kit::AlertController> DocumentListController::shownPeek() const
 {
     const auto peek = _peek.lock();
-    if (peek && presentedViewController() == peek)
+    return peek && peek->presentingViewController() ? peek : nullptr;
+}
+
+void DocumentListController::peekEnded()
+{
+    const auto told = delegate();
+    if (told && !shownPeek())
+        told->documentListControllerPeekDidEnd(self());
+}
+
+void DocumentListController::heldRowPressedOn(kit::ListView&)
+{
+    if (const auto peek = shownPeek())
         peek->press(peek->preferredAction());
 }
 
-void DocumentListController::endPeekAtMissingItem()
+void DocumentListController::endPeekAtMissingItem(const DocumentRows& rows)
 {
-    const auto peek = _peek.lock();
-    if (!peek || !peek->presentingViewController())
-        return;
-    const auto& rows = *_contents->rows();
-    if (std::ranges::find(rows.ids(), rows.idFor(*_peekedItem)) != rows.ids().end())
+    const auto peek = shownPeek();
+    if (!peek || holds(rows, *_peekedItem))
         return;
     const auto shown = window();
     peek->dismissViewController(false);
@@ -316,6 +351,11 @@ void DocumentListController::openFromPeek(const Url& url, FolderEntryKind kind)
         perform(DocumentListAction::PressurePop, url);
     else
         open(url, kind);
+}
+
+bool DocumentListController::isSearching() const
+{
+    return _search && _search->presentation()->presentingViewController();
 }
 
 void DocumentListController::selectionRequested(kit::ListView&)

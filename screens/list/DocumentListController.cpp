@@ -212,8 +212,8 @@ void DocumentListController::contentsDidChange(const FolderContentsUpdate& updat
     _rows->visibleRowsDidChange();
     if (update.stage != ListingStage::FirstRows) {
         _listView->endRefreshing();
-        if (!update.error)
-            endPeekAtMissingItem();
+        if (!update.error && !isSearching())
+            endPeekAtMissingItem(*update.rows);
     }
     showStateOfFolder();
     takeKeyboard();
@@ -274,6 +274,15 @@ void DocumentListController::startSearchWithQueryStringBecomeFirstResponder(
             [](DocumentListController& self, const Url& url) {
                 self.open(url.deletingLastPathComponent(), FolderEntryKind::Folder);
             }),
+        .menu = weaklyOr(kit::Menu(), this, &DocumentListController::menuFor),
+        .command = weaklyOr(false, this,
+            [](DocumentListController& self, const RowItem& item, kit::RowCommand command) {
+                return self.obey(command, item);
+            }),
+        .held = weaklyOr(false, this, &DocumentListController::peekAt),
+        .heldPressedOn = weakly(
+            this, [](DocumentListController& self) { self.heldRowPressedOn(*self._search->results()); }),
+        .completed = weakly(this, &DocumentListController::endPeekAtMissingItem),
     });
     const auto presentation = _search->presentation();
     presentation->setQuery(query);

@@ -31,10 +31,12 @@ class ListView;
 namespace screens {
 
 class DocumentRowSource;
+class DocumentRows;
 class DocumentSearch;
 class FolderContents;
 class PlaceholderView;
 struct FolderContentsUpdate;
+struct RowItem;
 
 /// The screen that shows one folder of the drive. It begins to list the folder when its view is loaded, and
 /// follows every change from then on. Main thread only; slow work runs on other threads.
@@ -155,8 +157,17 @@ private:
     void download(const Url& url);
     /// Answers the place of an item's row for a popover, or the list itself when the row is not visible.
     std::shared_ptr<kit::View> anchorFor(const Url& url);
-    /// Ends the peek at an item that the folder no longer has.
-    void endPeekAtMissingItem();
+    std::optional<RowItem> itemAt(std::size_t index) const;
+    // These act on an item of the folder or of the search's results.
+    kit::Menu menuFor(const RowItem& item);
+    bool obey(kit::RowCommand command, const RowItem& item);
+    bool peekAt(const RowItem& item);
+    void peekEnded();
+    /// Answers the latest peek while it is shown, else null.
+    std::shared_ptr<kit::AlertController> shownPeek() const;
+    /// Ends the peek at an item that is no longer among the rows that it was held in.
+    void endPeekAtMissingItem(const DocumentRows& rows);
+    bool isSearching() const;
     void openFromPeek(const Url& url, FolderEntryKind kind);
     /// Answers whether an action is enabled and applies to this kind of item.
     bool offers(DocumentListAction action, FolderEntryKind kind) const;

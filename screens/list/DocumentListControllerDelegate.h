@@ -52,6 +52,9 @@ public:
         return nullptr;
     }
 
+    /// A peek has closed, however it ended. What the user chose in it has been done before.
+    virtual void documentListControllerPeekDidEnd(const List&) { }
+
     /// The user chose an action of an item. `action` is a code of DocumentListAction. A popover may point at
     /// the view (null: nowhere). The delegate calls the completion when the action has ended.
     virtual void documentListControllerPerformActionURLOriginatingViewCompletion(const List& list, int action,

@@ -6,7 +6,9 @@
 #include "kit/controllers/AlertController.h"
 #include "kit/views/TapRecognizer.h"
 #include "kit/views/View.h"
+#include "platform/Dispatch.h"
 #include "platform/Localization.h"
+#include "platform/Services.h"
 #include "platform/Weakly.h"
 #include "screens/PlatformNames.h"
 
@@ -19,8 +21,9 @@ namespace {
 /// Holds the peeked screen in a place of fixed height.
 class Miniature : public kit::ViewController {
 public:
-    explicit Miniature(std::shared_ptr<kit::ViewController> screen)
-        : _screen(std::move(screen))
+    Miniature(std::shared_ptr<kit::ViewController> screen, std::function<void()> ended)
+        : _ended(std::move(ended))
+        , _screen(std::move(screen))
     {
     }
 
@@ -39,6 +42,13 @@ public:
         coverBy(place);
         kit::LayoutConstraint::activate(
             {place->heightAnchor().equalToConstant(DocumentPeek::miniatureHeight)});
+    }
+
+    void viewDidDisappear(bool animated) override
+    {
+        kit::ViewController::viewDidDisappear(animated);
+        // The chosen action runs in this turn of the main queue, right after the peek has gone.
+        services().dispatch().mainQueue()->async(std::exchange(_ended, [] {}));
     }
 
     /// Called when the miniature is tapped.
@@ -67,7 +77,7 @@ private:
         place->addSubview(pane);
     }
 
-    std::function<void()> _onTap;
+    std::function<void()> _onTap, _ended;
     std::shared_ptr<kit::ViewController> _screen;
 };
 
@@ -84,13 +94,13 @@ std::shared_ptr<kit::AlertAction> asAlertAction(const kit::MenuAction& action)
 } // namespace
 
 std::shared_ptr<kit::AlertController> DocumentPeek::make(const std::string& title,
-    const std::shared_ptr<kit::ViewController>& screen, const kit::Menu& actions, std::function<void()> open)
+    const std::shared_ptr<kit::ViewController>& screen, const kit::Menu& actions, const Handlers& handlers)
 {
     const auto peek =
         std::make_shared<kit::AlertController>(title, std::string(), kit::AlertStyle::ActionSheet);
-    const auto miniature = std::make_shared<Miniature>(screen);
+    const auto miniature = std::make_shared<Miniature>(screen, handlers.ended);
     const auto opening = std::make_shared<kit::AlertAction>(localized("Open"), kit::AlertActionStyle::Default,
-        [release = weakly(miniature, &Miniature::release), open = std::move(open)](const auto&) {
+        [release = weakly(miniature, &Miniature::release), open = handlers.open](const auto&) {
             release();
             open();
         });

@@ -22,10 +22,17 @@ namespace DocumentPeek {
 
 inline constexpr double miniatureHeight = 260; ///< points
 
-/// Answers the alert to present. `open` is called once, after the peek has closed and released the screen,
-/// which may then be shown elsewhere. Main thread.
+struct Handlers {
+    /// Called once when the user opens the item, after the peek has closed and released the screen, which may
+    /// then be shown elsewhere.
+    std::function<void()> open;
+    /// Called once after the peek has closed, however it ended, and after what was chosen in it was done.
+    std::function<void()> ended;
+};
+
+/// Answers the alert to present. Main thread.
 std::shared_ptr<kit::AlertController> make(const std::string& title,
-    const std::shared_ptr<kit::ViewController>& screen, const kit::Menu& actions, std::function<void()> open);
+    const std::shared_ptr<kit::ViewController>& screen, const kit::Menu& actions, const Handlers& handlers);
 
 } // namespace DocumentPeek
 

@@ -213,6 +213,20 @@ std::string DocumentRowSource::spokenKind(const FolderEntry& entry) const
     }
 }
 
+std::optional<platform::Rect> DocumentRowSource::visiblePlaceOf(const Url& url) const
+{
+    const auto list = _list.lock();
+    const auto [first, count] = list ? list->visibleRows() : kit::RowRange{};
+    for (std::size_t index = first; _rows && index < std::min(first + count, _rows->count()); ++index) {
+        if (_rows->url(index) != url)
+            continue;
+        const double top = static_cast<double>(index) * list->rowHeight() - list->contentOffset().y;
+        const auto& frame = list->frame();
+        return platform::Rect{frame.x, frame.y + top, frame.width, list->rowHeight()};
+    }
+    return std::nullopt;
+}
+
 void DocumentRowSource::visibleRowsDidChange()
 {
     const auto list = _list.lock();

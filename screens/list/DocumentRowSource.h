@@ -50,6 +50,9 @@ public:
     using Places = std::function<std::string(const Url& url)>;
     void setPlaces(Places places) { _places = std::move(places); }
 
+    /// Answers where an item's row is in the view around the list; nothing for a row that is not visible.
+    std::optional<platform::Rect> visiblePlaceOf(const Url& url) const;
+
     /// Fetches the missing details of the visible rows.
     void visibleRowsDidChange();
     /// The details of these items, or of all when absent, may have changed. Known details stay on the screen

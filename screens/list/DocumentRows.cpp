@@ -21,12 +21,6 @@ kit::RowId idOfName(std::string_view name)
     return std::hash<std::string_view>{}(name);
 }
 
-kit::RowId idOfExtraItem(const Url& url)
-{
-    // The hash is inverted, because a folder beside the library may have the same name.
-    return ~std::hash<std::string>{}(url.path());
-}
-
 /// Answers in one number how a row looks apart from its name.
 unsigned appearance(const FolderEntry& entry)
 {
@@ -118,7 +112,7 @@ std::shared_ptr<const DocumentRows> DocumentRows::make(
 kit::RowId DocumentRows::idAt(std::size_t row) const
 {
     const auto* extra = extraItem(row);
-    return extra ? idOfExtraItem(extra->url) : idOfName(entry(row).name);
+    return extra ? idForExtraItem(extra->url) : idOfName(entry(row).name);
 }
 
 RowsStep DocumentRows::step(
@@ -158,10 +152,16 @@ std::optional<RowsStep> DocumentRows::revised(
     return made;
 }
 
+kit::RowId DocumentRows::idForExtraItem(const Url& url)
+{
+    // The hash is inverted, because a folder beside the library may have the same name.
+    return ~std::hash<std::string>{}(url.path());
+}
+
 kit::RowId DocumentRows::idFor(const Url& url) const
 {
     const bool isInFolder = url.deletingLastPathComponent() == _snapshot->folder();
-    return isInFolder ? idOfName(url.lastPathComponent()) : idOfExtraItem(url);
+    return isInFolder ? idOfName(url.lastPathComponent()) : idForExtraItem(url);
 }
 
 std::optional<std::size_t> DocumentRows::rowBeginningWith(std::string_view text, std::size_t from) const

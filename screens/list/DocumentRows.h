@@ -53,6 +53,8 @@ public:
 
     /// Answers the identifier that the row of an item has or would have.
     kit::RowId idFor(const Url& url) const;
+    /// Answers the same for an item that lies elsewhere, as the results of a search do.
+    static kit::RowId idForExtraItem(const Url& url);
 
     /// Answers the first row at or after `from`, and then from the top, whose name begins with a text
     /// regardless of case and accents. Main thread.

@@ -26,6 +26,16 @@ std::shared_ptr<const DocumentRows> rowsOf(const NameSearchResults& results)
     return DocumentRows::make(builder.finish(ListingStage::Complete));
 }
 
+std::set<std::string> promisedPaths(const NameSearchResults& results)
+{
+    std::set<std::string> paths;
+    for (const auto& item : results.items) {
+        if (item.isPromise)
+            paths.insert(item.url.path());
+    }
+    return paths;
+}
+
 } // namespace
 
 std::shared_ptr<DocumentSearch> DocumentSearch::create(Handlers handlers)
@@ -61,6 +71,9 @@ void DocumentSearch::build()
         part->setFrame(view->bounds());
         view->addSubview(part);
     }
+    _rowAnchor = std::make_shared<kit::View>();
+    _rowAnchor->setHidden(true);
+    view->addSubview(_rowAnchor);
     _presentation->setDelegate(std::shared_ptr<kit::SearchPresentationDelegate>(
         shared_from_this(), static_cast<kit::SearchPresentationDelegate*>(this)));
     // The search begins with an empty query, so that the names are read before the first letter is typed.
@@ -118,6 +131,7 @@ void DocumentSearch::resultsArrived(const NameSearchResults& results)
     auto rows = rowsOf(results);
     const bool isSameQuery = before && results.query == _shownQuery;
     _shownQuery = results.query;
+    _promised = promisedPaths(results);
     const auto changes = isSameQuery ? DocumentRows::changes(*before, *rows) : kit::ListChanges();
     _source->setRows(std::move(rows));
     if (isSameQuery)
@@ -127,6 +141,8 @@ void DocumentSearch::resultsArrived(const NameSearchResults& results)
     _source->visibleRowsDidChange();
     showState(results);
     _isComplete = results.isComplete;
+    if (_isComplete)
+        _handlers.completed(*_source->rows());
     catchUp();
 }
 
@@ -154,12 +170,49 @@ void DocumentSearch::rowActivated(kit::ListView&, std::size_t index)
 
 kit::Menu DocumentSearch::menuForRow(kit::ListView&, std::size_t index)
 {
+    const auto item = itemAt(index);
+    if (!item)
+        return {};
+    auto show = weakly(this, [url = item->url](DocumentSearch& self) { self._handlers.showInFolder(url); });
+    auto menu = _handlers.menu(*item);
+    menu.insert(
+        menu.begin(), {.title = localized("Show in Its Folder"), .handler = std::move(show), .image = {}});
+    return menu;
+}
+
+std::optional<RowItem> DocumentSearch::itemAt(std::size_t index) const
+{
     const auto& rows = _source->rows();
     if (!rows || index >= rows->count())
-        return {};
-    auto show =
-        weakly(this, [url = rows->url(index)](DocumentSearch& self) { self._handlers.showInFolder(url); });
-    return {{.title = localized("Show in Its Folder"), .handler = std::move(show), .image = {}}};
+        return std::nullopt;
+    const auto url = rows->url(index);
+    return RowItem{url, rows->entry(index).kind, _promised.contains(url.path()), _results->row(index).title};
+}
+
+bool DocumentSearch::rowCommand(kit::ListView&, std::size_t index, kit::RowCommand command)
+{
+    const auto item = itemAt(index);
+    return item && _handlers.command(*item, command);
+}
+
+bool DocumentSearch::rowHeld(kit::ListView&, std::size_t index)
+{
+    const auto item = itemAt(index);
+    return item && _handlers.held(*item);
+}
+
+void DocumentSearch::heldRowPressedOn(kit::ListView&)
+{
+    _handlers.heldPressedOn();
+}
+
+std::shared_ptr<kit::View> DocumentSearch::anchorFor(const Url& url) const
+{
+    const auto place = _source->visiblePlaceOf(url);
+    if (!place)
+        return _results;
+    _rowAnchor->setFrame(*place);
+    return _rowAnchor;
 }
 
 void DocumentSearch::visibleRowsDidChange(kit::ListView&, kit::RowRange)

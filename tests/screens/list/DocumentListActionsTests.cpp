@@ -223,6 +223,21 @@ TEST_F(DocumentList, SearchesTheWholeDriveAndSaysWhereItemsLie)
             testing::Pair("Trip", testing::StartsWith("Stuff · ")),
             testing::Pair("trip plan.txt", testing::StartsWith(folderTitle(drive.url(""))))));
 
+    delegate->take();
+    list->setAvailableActions(125);
+    std::size_t plan = 0;
+    while (results->row(plan).title != "trip plan.txt")
+        ++plan;
+    for (const auto& entry : results->menuForRow(plan)) {
+        if (entry.title != "Show in Its Folder")
+            entry.handler();
+    }
+    EXPECT_TRUE(results->commandRow(plan, kit::RowCommand::Rename));
+    Lines actions;
+    for (const int action : {2, 4, 3, 5, 0, 3})
+        actions.push_back("action " + std::to_string(action) + " trip plan.txt");
+    EXPECT_EQ(delegate->take(), actions);
+
     search->userEditedQuery("");
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(results->rowCount(), 0U);
