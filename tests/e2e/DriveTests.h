@@ -39,7 +39,13 @@ protected:
         std::filesystem::remove_all(home);
     }
 
-    void start() { program.emplace(environment); }
+    void start(const std::vector<std::string>& arguments = {}) { program.emplace(environment, arguments); }
+    /// Ends the program and starts it again.
+    void startAgain(const std::vector<std::string>& arguments = {})
+    {
+        program.reset();
+        start(arguments);
+    }
 
     /// Runs a command of another program on the drive.
     int files(const std::vector<std::string>& arguments) const

@@ -58,14 +58,16 @@ int Program::run(const std::vector<std::string>& command, const Environment& cha
     return hasEnded ? g_subprocess_get_exit_status(process.get()) : -1;
 }
 
-Program::Program(const Environment& changes)
+Program::Program(const Environment& changes, const std::vector<std::string>& arguments)
 {
     static int programs = 0;
     _errors = std::string(getenv("HOME")) + "/errors." + std::to_string(++programs);
     EXPECT_LE(atspi_init(), 1); // 1 means that an earlier program of this process did it
     // The first look starts the accessibility registry, which might not see a program that started before it.
     atspi_accessible_get_child_count(atspi_get_desktop(0), nullptr);
-    _process = spawn({getenv("TRW_PROGRAM")}, changes, _errors);
+    std::vector<std::string> command{getenv("TRW_PROGRAM")};
+    command.insert(command.end(), arguments.begin(), arguments.end());
+    _process = spawn(command, changes, _errors);
     EXPECT_TRUE(_process && Accessible::waitFor([this] {
         const char* number = g_subprocess_get_identifier(_process.get());
         return number && (_tree = Accessible::application("tarrow-drive", std::atoi(number)));

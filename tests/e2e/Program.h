@@ -20,7 +20,7 @@ public:
     using Environment = std::map<std::string, std::string>;
 
     /// Starts the program with a changed environment, and waits until it shows its window.
-    explicit Program(const Environment& changes = {});
+    explicit Program(const Environment& changes = {}, const std::vector<std::string>& arguments = {});
     ~Program();
 
     std::vector<Accessible> all(const std::function<bool(const Accessible&)>& matches) const
