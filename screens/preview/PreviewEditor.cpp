@@ -133,16 +133,17 @@ void PreviewEditor::use(EditTool tool)
 
 void PreviewEditor::apply(PageEdit edit)
 {
-    _editing->apply(std::move(edit), weakly(this, &PreviewEditor::changed));
+    _editing->apply(std::move(edit), changed());
     update();
 }
 
 std::function<void(PageEdit)> PreviewEditor::applier()
 {
-    return [weak = weak_from_this(), editing = _editing, late = _callbacks.editedLate](PageEdit edit) {
+    return [weak = weak_from_this(), editing = _editing, followed = changed(), late = _callbacks.editedLate](
+               PageEdit edit) {
         if (const auto self = weak.lock())
             return self->apply(std::move(edit));
-        editing->apply(std::move(edit), [](const auto&) {});
+        editing->apply(std::move(edit), followed);
         late(editing);
     };
 }
@@ -153,19 +154,25 @@ void PreviewEditor::undo()
         return;
     // A text that is still being written is the latest edit, so it is finished first and then undone.
     finishWriting();
-    _editing->undo(weakly(this, &PreviewEditor::changed));
+    _editing->undo(changed());
     update();
 }
 
-void PreviewEditor::changed(const std::optional<Error>& error)
+/// Answers what follows an edit. The last one before Done is made when this object has gone, and must be seen
+/// all the same.
+PreviewEditing::Stepped PreviewEditor::changed()
 {
-    if (error)
-        _callbacks.present(
-            messageAlert(localized("This cannot be changed"), localized("The document does not allow it.")));
-    if (const auto pages = _pages.lock())
-        pages->documentDidChange();
-    readFields();
-    update();
+    return [weak = weak_from_this(), pages = _pages, present = _callbacks.present](const auto& error) {
+        if (error)
+            present(messageAlert(
+                localized("This cannot be changed"), localized("The document does not allow it.")));
+        if (const auto shown = pages.lock())
+            shown->documentDidChange();
+        if (const auto self = weak.lock()) {
+            self->readFields();
+            self->update();
+        }
+    };
 }
 
 void PreviewEditor::readFields()

@@ -58,7 +58,7 @@ private:
     /// Answers a function that makes an edit also when this object has gone.
     std::function<void(PageEdit)> applier();
     void undo();
-    void changed(const std::optional<Error>& error);
+    PreviewEditing::Stepped changed();
     void readFields();
     void showFields(std::vector<FormField> fields);
     void mark(PageMark::Kind kind);

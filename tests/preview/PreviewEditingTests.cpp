@@ -139,8 +139,11 @@ TEST_F(PreviewEditingTest, SavesWhenThePersonIsDoneAndGoesOnShowingThePlace)
     EXPECT_EQ(pages().visiblePlace(), (Point{0, 300}));
     edit();
     EXPECT_EQ(pages().fields()[0].text, "Ada");
+    write("Ada Lovelace");
+    const auto before = *pages().deck().picture(0);
     press(EditTool::Done);
     EXPECT_EQ(alert(), nullptr);
+    EXPECT_FALSE(*pages().deck().picture(0) == before) << "what was written last is seen";
 }
 
 TEST_F(PreviewEditingTest, TakesBackMarksAndNotesAndReadsThem)
