@@ -6,10 +6,12 @@
 #include "platform/Error.h"
 
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace platform {
 
@@ -29,6 +31,10 @@ struct FileContent {
     std::shared_ptr<const std::string> bytes; ///< never null when a call answers it
     ItemVersion version; ///< the state in which they were read or written
 };
+
+/// Answers whether a text (UTF-8) can be the name of a tag: it is not empty, has at most 255 bytes, no comma
+/// and no control character, and neither begins nor ends with a blank.
+bool isTag(std::string_view text);
 
 /// The changes of the drive's items, and the looks that a change is compared with. They are without
 /// coordination: who needs others kept out calls them inside an accessor of the FileCoordinator. They take a
@@ -79,6 +85,16 @@ public:
     /// (FileErrorCode::Cancelled); other tags or a new name are no such change.
     virtual Result<ItemVersion> replaceContent(
         const std::string& path, const FileContent& before, std::string_view content) = 0;
+    /// Answers the tags that an item shall have in place of these. It is asked again when another program
+    /// changes the item in between.
+    using TagEdit = std::function<std::vector<std::string>(const std::vector<std::string>& before)>;
+    /// Gives an item other tags, also one that is only promised, and answers those that it had before. Nothing
+    /// is written when the tags stay the same. Errors: FileErrorCode::InvalidName for a tag that cannot be
+    /// kept (see isTag()); FileErrorCode::Unsupported for what can have no tags, such as a link; E2BIG or
+    /// ENOSPC for more tags than an item can have; EBUSY when another program changed the item in each of
+    /// three attempts.
+    virtual Result<std::vector<std::string>> editTags(const std::string& path, const TagEdit& edit) = 0;
+
     /// Makes a document with the tags and the access of another one, `like`, as far as that one is there; the
     /// identifier stays with the other one. Nothing is ever replaced (FileErrorCode::ItemExists), and a
     /// document that cannot be made whole leaves nothing.

@@ -1,6 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
+#include "items/DRItem.h"
 #include "items/FileUtils.h"
 #include "tests/items/support/ItemsFixture.h"
 
@@ -26,6 +27,29 @@ TEST_F(FileUtilsTest, PrefersThePromisedValueOfAnAttribute)
     changeValues([](const Url&, AttributeMap& values) { values.set(AttributeKey::FileSize, {}); });
     EXPECT_EQ(
         FileUtils::getResourceValueForURL(AttributeKey::FileSize, local), AttributeValue(std::uint64_t{2}));
+}
+
+TEST_F(FileUtilsTest, ChangesTagsInACoordinatedWriteThatCanBeUndone)
+{
+    using Tags = std::vector<std::string>;
+    const auto document = writeDocument("a.txt", "1");
+    mark(document, host::drive::itemMark::tags, "Old,Work");
+    const auto tags = [](const Url& url) { return DRItem::initWithURL(url)->tags(); };
+    const auto before = FileUtils::changeTags(document, {"Red", "Work"}, {"Old", "Blue"});
+    EXPECT_EQ(before.value, (Tags{"Old", "Work"}));
+    EXPECT_THAT(tags(document), ElementsAre("Work", "Red"));
+    const auto reference = writeReference("pointer.trwref", "BrindleDefault", "a.txt");
+    EXPECT_TRUE(FileUtils::setTags(reference, *before));
+    EXPECT_THAT(tags(document), ElementsAre("Old", "Work")) << "those of what the reference stands for";
+
+    const auto unwanted = FileUtils::setTags(document, {}, [] { return false; });
+    EXPECT_TRUE(unwanted.error->is(FileErrorCode::Cancelled));
+    const auto reading =
+        fileCoordinator->coordinateReading(document, platform::ReadingOptions::None, [&](const Url&) {
+            EXPECT_EQ(FileUtils::setTags(document, {}).error->code(), EDEADLK) << "somebody reads it";
+        });
+    EXPECT_FALSE(reading);
+    EXPECT_THAT(tags(document), ElementsAre("Old", "Work"));
 }
 
 TEST_F(FileUtilsTest, AsksTheContainerForTheTypesItTakes)

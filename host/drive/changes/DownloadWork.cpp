@@ -63,6 +63,13 @@ SystemError checkSize(const FileDescriptor& file, const PromiseRecord& promise)
     return isShort ? SystemError(EIO) : SystemError();
 }
 
+/// Gives the new document the tags that its promise was given during the download.
+SystemError takeNewTags(const FileDescriptor& file, const DriveEntry& entry, const PromiseRecord& promise)
+{
+    const auto now = readPromise(entry);
+    return !now || now->tags == promise.tags ? SystemError() : writeTags(file, now->tags);
+}
+
 /// Removes the promise, or the new document when its promise was meanwhile deleted or moved away: such a
 /// document must not appear in its old place again.
 SystemError settlePromise(const DriveLayout& layout, const DriveEntry& entry, CloudStore& store,
@@ -95,6 +102,7 @@ SystemError fetchInto(const DriveLayout& layout, CloudStore& store, const DriveE
     if (::fstat(file->descriptor().get(), &whole) != 0)
         return SystemError::last(entry.name);
     TRW_TRY(file->publish(entry, entry.name));
+    TRW_TRY(takeNewTags(file->descriptor(), entry, promise));
     return settlePromise(layout, entry, store, versionOf(whole));
 }
 

@@ -38,6 +38,8 @@ public:
         const std::string& path, std::size_t maximumBytes) const override;
     platform::Result<platform::ItemVersion> replaceContent(
         const std::string& path, const platform::FileContent& before, std::string_view content) override;
+    platform::Result<std::vector<std::string>> editTags(
+        const std::string& path, const TagEdit& edit) override;
     std::optional<platform::Error> addDocument(
         const std::string& path, const std::string& like, std::string_view content) override;
 

@@ -40,18 +40,6 @@ std::string attributeValue(const std::string& path, const char* name)
     return large;
 }
 
-std::vector<std::string> splitTags(std::string_view text)
-{
-    std::vector<std::string> tags;
-    while (!text.empty()) {
-        const auto end = std::min(text.find(','), text.size());
-        if (end > 0 && platform::isValidUtf8(text.substr(0, end)))
-            tags.emplace_back(text.substr(0, end));
-        text.remove_prefix(std::min(end + 1, text.size()));
-    }
-    return tags;
-}
-
 std::uint32_t identifier(const std::string& text)
 {
     std::uint32_t value = 0;
@@ -137,6 +125,47 @@ std::string joinedTags(const std::vector<std::string>& tags)
     for (const auto& tag : tags)
         text.append(text.empty() ? "" : ",").append(tag);
     return text;
+}
+
+std::vector<std::string> splitTags(std::string_view text)
+{
+    std::vector<std::string> tags;
+    while (!text.empty()) {
+        const auto end = std::min(text.find(','), text.size());
+        if (end > 0 && platform::isValidUtf8(text.substr(0, end)))
+            tags.emplace_back(text.substr(0, end));
+        text.remove_prefix(std::min(end + 1, text.size()));
+    }
+    return tags;
+}
+
+std::vector<std::string> tagsAt(const std::string& path, bool isPromise)
+{
+    if (!isPromise)
+        return splitTags(attributeValue(path, itemMark::tags));
+    const auto text = readSmallFile(PromiseRecord::pathFor(path), PromiseRecord::maximumFileSize);
+    auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
+    return promise ? std::move(promise->tags) : std::vector<std::string>();
+}
+
+std::vector<std::string> tagsOf(const host::system::FileDescriptor& item)
+{
+    // The descriptor's own path is a link to the item, so the call that follows no link would ask the link.
+    std::string text(largestAttribute, '\0');
+    const auto length = ::getxattr(descriptorPath(item).c_str(), itemMark::tags, text.data(), text.size());
+    text.resize(length < 0 ? 0 : static_cast<std::size_t>(length));
+    return splitTags(text);
+}
+
+SystemError writeTags(const host::system::FileDescriptor& item, const std::vector<std::string>& tags)
+{
+    const auto path = descriptorPath(item);
+    const auto text = joinedTags(tags);
+    if (!tags.empty())
+        return SystemError::unless(
+            ::setxattr(path.c_str(), itemMark::tags, text.data(), text.size(), 0) == 0);
+    const bool hasNone = ::removexattr(path.c_str(), itemMark::tags) == 0 || errno == ENODATA;
+    return SystemError::unless(hasNone);
 }
 
 ItemMarks ItemMarks::read(const std::string& path)

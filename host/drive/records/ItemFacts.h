@@ -5,6 +5,7 @@
 
 #include "host/drive/records/PromiseRecord.h"
 #include "host/system/files/FileDescriptor.h"
+#include "host/system/files/SystemError.h"
 #include "platform/Attributes.h"
 #include "platform/Error.h"
 
@@ -12,6 +13,7 @@
 
 #include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace host::drive {
@@ -39,8 +41,17 @@ inline constexpr const char* status = "user.tarrow.status"; ///< "downloaded" or
 inline constexpr const char* documentIdentifier = "user.tarrow.document-id"; ///< decimal
 inline constexpr const char* tags = "user.xdg.tags"; ///< names separated by commas
 } // namespace itemMark
-/// Answers tags as the text of their attribute.
+/// Answers tags as the text of their attribute, and the tags in such a text.
 std::string joinedTags(const std::vector<std::string>& tags);
+std::vector<std::string> splitTags(std::string_view text);
+/// Answers the tags of the item at a path, or of its promise. It follows no link at the path's end, and
+/// answers none for what cannot be read.
+std::vector<std::string> tagsAt(const std::string& path, bool isPromise);
+/// Answers the tags of an open item, which may be opened with O_PATH; none for a promise.
+std::vector<std::string> tagsOf(const host::system::FileDescriptor& item);
+/// Gives an open item tags in place of its own. The descriptor may be opened with O_PATH.
+host::system::SystemError writeTags(
+    const host::system::FileDescriptor& item, const std::vector<std::string>& tags);
 
 /// The result of one look at a logical location: the item itself, else its promise.
 struct ItemFacts {

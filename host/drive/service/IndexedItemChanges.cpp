@@ -36,6 +36,16 @@ platform::Result<ItemVersion> IndexedItemChanges::replaceContent(
     return replaced;
 }
 
+platform::Result<std::vector<std::string>> IndexedItemChanges::editTags(
+    const std::string& path, const TagEdit& edit)
+{
+    auto before = LocalItemChanges::editTags(path, edit);
+    // A promise is another file with other tags.
+    if (before)
+        _identifiers->moved(path, path);
+    return before;
+}
+
 std::optional<Error> IndexedItemChanges::evictItem(const std::string& path)
 {
     auto error = LocalItemChanges::evictItem(path);

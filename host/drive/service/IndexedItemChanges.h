@@ -21,6 +21,8 @@ public:
     std::optional<platform::Error> removeItem(
         const std::string& path, const std::optional<platform::ItemVersion>& unchangedSince) override;
     std::optional<platform::Error> moveItem(const std::string& from, const std::string& to) override;
+    platform::Result<std::vector<std::string>> editTags(
+        const std::string& path, const TagEdit& edit) override;
     std::optional<platform::Error> evictItem(const std::string& path) override;
     platform::Result<platform::ItemVersion> replaceContent(
         const std::string& path, const platform::FileContent& before, std::string_view content) override;

@@ -1,0 +1,63 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
+#include "items/FileUtils.h"
+#include "items/UrlResolution.h"
+
+#include "platform/FileChanges.h"
+#include "platform/FileCoordinator.h"
+
+#include <algorithm>
+
+namespace tarrow {
+
+namespace {
+
+using Tags = std::vector<std::string>;
+
+/// Changes the tags of an item in a coordinated write.
+Result<Tags> editTags(const Url& url, const FileUtils::StillWanted& stillWanted, const Operation& op,
+    const platform::FileChanges::TagEdit& edit)
+{
+    const auto item = trw_URLByResolvingBookmark(url);
+    if (!item)
+        return Error(FileErrorCode::NoSuchItem);
+    Result<Tags> before = Error(FileErrorCode::Cancelled);
+    const auto refused = services().fileCoordinator().coordinateWriting(
+        *item, platform::WritingOptions::None, [&](const Url& location) {
+            if (!stillWanted || stillWanted())
+                before = services().fileChanges().editTags(location.path(), edit);
+        });
+    if (refused)
+        return *refused;
+    if (before)
+        op.info("Changed the tags of '%@'", *item);
+    else
+        op.error("failed to change the tags of '%@': %@", *item, *before.error);
+    return before;
+}
+
+} // namespace
+
+Result<Tags> FileUtils::setTags(const Url& url, const Tags& tags, const StillWanted& stillWanted)
+{
+    static constexpr Operation op{"+[FileUtils setTags:]"};
+    return editTags(url, stillWanted, op, [&](const Tags&) { return tags; });
+}
+
+Result<Tags> FileUtils::changeTags(
+    const Url& url, const Tags& added, const Tags& removed, const StillWanted& stillWanted)
+{
+    static constexpr Operation op{"+[FileUtils changeTags:]"};
+    return editTags(url, stillWanted, op, [&](Tags tags) {
+        std::erase_if(
+            tags, [&](const std::string& tag) { return std::ranges::find(removed, tag) != removed.end(); });
+        for (const auto& tag : added) {
+            if (std::ranges::find(tags, tag) == tags.end())
+                tags.push_back(tag);
+        }
+        return tags;
+    });
+}
+
+} // namespace tarrow
