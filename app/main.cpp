@@ -3,6 +3,7 @@
 
 #include "app/AppDelegate.h"
 #include "app/BuildDate.h"
+#include "host/drive/records/ItemFacts.h"
 #include "host/drive/service/LocalActivityHandOver.h"
 #include "host/drive/service/LocalCloudDocumentService.h"
 #include "host/gtk/app/DesktopSharing.h"
@@ -26,6 +27,7 @@
 #include "host/system/search/IndexedNameSearch.h"
 #include "host/system/texts/GettextLocalization.h"
 #include "host/system/texts/IcuFormatters.h"
+#include "host/system/texts/Translate.h"
 #include "host/system/texts/UnicodeCharacterData.h"
 #include "host/system/texts/UserLocale.h"
 #include "items/FileUtils.h"
@@ -95,7 +97,9 @@ ServiceSet systemServices(const std::string& executable, const UserLocale& local
     set.documentSharing = std::make_shared<host::gtk::DesktopSharing>(types, previews);
     set.folderLister =
         std::make_shared<host::system::ThreadedFolderLister>(set.dispatch, types, locale.formats);
-    set.nameSearch = std::make_shared<host::system::IndexedNameSearch>(set.dispatch, types);
+    set.nameSearch = std::make_shared<host::system::IndexedNameSearch>(set.dispatch, types,
+        host::system::IndexedNameSearch::Tags{
+            host::drive::tagsAt, {"tag:", set.localization->text(host::system::textKey("tag:"))}});
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(types);
     set.imageLoader = std::make_shared<host::system::GdkPixbufImageLoader>();
     set.pagedDocumentOpener = previews;

@@ -29,6 +29,7 @@ struct NameSearchResults {
     std::vector<FoundItem> items;
     std::size_t total = 0; ///< how many items were found, also those that `items` leaves out
     bool isComplete = false; ///< all names were searched; until then more may be found
+    bool isForTag = false; ///< the query asks for items with a tag
 };
 
 /// A search that goes on while the person types. Destroying it, on the main thread, ends it; its callback is
@@ -44,6 +45,9 @@ public:
 /// Searches the names of all items below some folders, here or promised. Hidden items and what lies inside
 /// packages are left out, links are not followed, and contents are never read. Every word of a query must
 /// stand in the name; letter case and accents make no difference.
+///
+/// A query that begins with "tag:", or with that word in the user's language, finds the items with a tag that
+/// begins with the rest of the query; without a rest it finds all items with tags.
 class NameSearch {
 public:
     /// Takes the results of the session's present query.

@@ -151,11 +151,13 @@ void DocumentSearch::showState(const NameSearchResults& results)
     if (results.query.empty())
         _placeholder->setContent({.iconName = "edit-find-symbolic",
             .title = localized("Search the whole drive"),
-            .message = localized("Find folders and documents by their names.")});
+            .message = localized("Find folders and documents by their names, or with “%@” by their tags.",
+                {localized("tag:")})});
     else if (results.isComplete)
         _placeholder->setContent({.iconName = "edit-find-symbolic",
             .title = localized("Nothing found"),
-            .message = localized("No item of the drive has a name with this text.")});
+            .message = results.isForTag ? localized("No item of the drive has a tag with this name.")
+                                        : localized("No item of the drive has a name with this text.")});
     else
         _placeholder->setContent({.message = localized("Searching…"), .isBusy = true});
     _placeholder->setHidden(results.total > 0);

@@ -34,6 +34,10 @@ TEST_F(BrowseTests, ASearchFindsWhatLiesElsewhereAndShowsItsPlace)
     EXPECT_TRUE(eventually([this] { return program->entries().empty() && program->shows("Tuscany.md"); }));
     program->press("Back");
     EXPECT_TRUE(eventually([this] { return program->shows("Ideas.md"); })) << "not in its real place";
+
+    search("tag:fam");
+    EXPECT_TRUE(eventually([this] { return program->shows("Grandma's plum dumplings.txt"); }));
+    EXPECT_FALSE(program->shows("Lemon cake.md")) << "it has another tag";
 }
 
 TEST_F(BrowseTests, AnItemGoesToANewFolderThroughThePicker)

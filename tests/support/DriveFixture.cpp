@@ -94,7 +94,8 @@ DriveFixture::DriveFixture()
     set.typeRegistry = types();
     set.previewSupport = std::make_shared<host::system::TypePreviewSupport>(set.typeRegistry);
     set.folderLister = std::make_shared<host::system::ThreadedFolderLister>(dispatch, types(), "en_US");
-    set.nameSearch = std::make_shared<host::system::IndexedNameSearch>(dispatch, types());
+    set.nameSearch = std::make_shared<host::system::IndexedNameSearch>(
+        dispatch, types(), host::system::IndexedNameSearch::Tags{host::drive::tagsAt, {"tag:", "Etikett:"}});
     set.keyedArchiver = std::make_shared<host::system::JsonKeyedArchiver>();
     set.userDefaults = std::make_shared<host::system::JsonUserDefaults>(layout.defaults(), *dispatch);
     host::drive::DriveDependencies dependencies{

@@ -6,9 +6,11 @@
 #include "host/system/search/NameGathering.h"
 #include "platform/Weakly.h"
 
+#include <algorithm>
 #include <atomic>
 #include <chrono>
 #include <mutex>
+#include <optional>
 #include <utility>
 
 namespace host::system {
@@ -23,6 +25,7 @@ using Index = std::shared_ptr<const NameIndex>;
 
 constexpr auto refreshInterval = std::chrono::seconds(2);
 constexpr auto keptUnused = std::chrono::seconds(60);
+constexpr int restAfterTags = 20; ///< a look at all tags is followed by so many times its duration
 
 std::vector<std::string> pathsOf(const std::vector<Url>& folders)
 {
@@ -38,12 +41,30 @@ std::vector<std::string> pathsOf(const std::vector<Url>& folders)
 /// The state that all searches share: the index of the last search, and the queues.
 class IndexedNameSearch::Store : public std::enable_shared_from_this<Store> {
 public:
-    Store(std::shared_ptr<platform::Dispatch> usedDispatch, std::shared_ptr<const MimeTypeRegistry> types)
+    Store(std::shared_ptr<platform::Dispatch> usedDispatch, std::shared_ptr<const MimeTypeRegistry> types,
+        const Tags& tags)
         : dispatch(std::move(usedDispatch))
         , classifier(std::move(types))
+        , readTags(tags.reader)
         , reading(dispatch->makeSerialQueue("name search reading"))
         , finding(dispatch->makeSerialQueue("name search"))
     {
+        for (const auto& prefix : tags.prefixes) {
+            auto& text = _tagPrefixes.emplace_back();
+            folding.append(prefix, text);
+        }
+    }
+
+    /// Answers the beginning of the tag that a folded query asks for, or nothing when it asks for names.
+    std::optional<std::string_view> tagAskedFor(std::string_view foldedQuery) const
+    {
+        const auto prefix = std::ranges::find_if(
+            _tagPrefixes, [&](const std::string& text) { return foldedQuery.starts_with(text); });
+        if (prefix == _tagPrefixes.end())
+            return std::nullopt;
+        foldedQuery.remove_prefix(prefix->size());
+        foldedQuery.remove_prefix(std::min(foldedQuery.find_first_not_of(' '), foldedQuery.size()));
+        return foldedQuery;
     }
 
     /// Answers the index of exactly these roots, or null when it is not kept.
@@ -71,12 +92,14 @@ public:
     const std::shared_ptr<platform::Dispatch> dispatch;
     const EntryClassifier classifier;
     const NameFolding folding;
+    const TagIndex::Reader readTags;
     const std::shared_ptr<platform::Queue> reading, finding;
 
 private:
     std::mutex _mutex;
     std::vector<std::string> _roots;
     Index _index;
+    std::vector<std::string> _tagPrefixes; ///< folded
     std::atomic<int> _sessions = 0;
     std::atomic<unsigned> _ended = 0;
 };
@@ -191,10 +214,10 @@ private:
             return;
         std::string folded;
         _store->folding.append(results.query, folded);
-        const auto found = index->find(folded, shownItems, [&] { return _generation != generation; });
-        results.total = found.total;
-        for (const auto number : found.items)
-            results.items.push_back(index->found(number));
+        if (const auto tag = _store->tagAskedFor(folded))
+            findTagged(*tag, index, results);
+        else
+            take(index->find(folded, shownItems, [&] { return _generation != generation; }), *index, results);
         _store->dispatch->mainQueue()->async(
             weakly(this, [generation, results = std::move(results)](Session& self) {
                 if (self._generation == generation)
@@ -202,20 +225,100 @@ private:
             }));
     }
 
+    static void take(const NameIndex::Found& found, const NameIndex& index, NameSearchResults& results)
+    {
+        results.total = found.total;
+        for (const auto number : found.items)
+            results.items.push_back(index.found(number));
+    }
+
+    /// Answers what is known of the items with a tag. When the names are others by now, their tags are looked
+    /// at.
+    void findTagged(std::string_view tag, const Index& index, NameSearchResults& results)
+    {
+        results.isForTag = true;
+        const auto tags = this->tags();
+        const bool isKnown = tags && &tags->names() == index.get();
+        if (tags)
+            take(tags->find(tag, shownItems), tags->names(), results);
+        if (results.isComplete && !isKnown)
+            gatherTagsSoon();
+        results.isComplete = results.isComplete && isKnown;
+    }
+
+    std::shared_ptr<const TagIndex> tags()
+    {
+        const std::lock_guard lock(_mutex);
+        return _tags;
+    }
+
+    void gatherTagsSoon()
+    {
+        if (!_gathersTags.exchange(true))
+            _store->reading->async([weak = weak_from_this()] { gatherTags(weak); });
+    }
+
+    /// Looks at the tags without keeping the session alive, as refresh() does.
+    static void gatherTags(const Weak& weak)
+    {
+        auto session = weak.lock();
+        if (!session)
+            return;
+        const auto store = session->_store;
+        const auto index = session->index();
+        session.reset();
+        const auto began = std::chrono::steady_clock::now();
+        auto tags = std::make_shared<const TagIndex>(
+            TagIndex::gather(index, store->readTags, store->folding, [&weak] { return weak.expired(); }));
+        session = weak.lock();
+        if (!session)
+            return;
+        const auto duration = std::chrono::steady_clock::now() - began;
+        const auto rest = std::max<std::chrono::nanoseconds>(refreshInterval, duration * restAfterTags);
+        session->adoptTags(std::move(tags));
+        store->dispatch->after(std::chrono::duration_cast<std::chrono::milliseconds>(rest), store->reading,
+            weakly(weak, [round = ++session->_tagRounds](Session& self) {
+                if (self._tagRounds == round && self.asksForTag())
+                    self.gatherTagsSoon();
+            }));
+    }
+
+    void adoptTags(std::shared_ptr<const TagIndex> tags)
+    {
+        {
+            const std::lock_guard lock(_mutex);
+            _tags = std::move(tags);
+        }
+        _gathersTags = false;
+        findSoon();
+    }
+
+    bool asksForTag()
+    {
+        std::string folded;
+        {
+            const std::lock_guard lock(_mutex);
+            _store->folding.append(_query, folded);
+        }
+        return _store->tagAskedFor(folded).has_value();
+    }
+
     const std::shared_ptr<Store> _store;
     const std::vector<std::string> _roots;
     const Update _update;
     std::atomic<unsigned> _generation = 0; ///< number of the query
-    std::atomic<bool> _findIsWaiting = false;
+    std::atomic<bool> _findIsWaiting = false, _gathersTags = false;
+    std::atomic<unsigned> _tagRounds = 0; ///< number of looks at all tags
     std::mutex _mutex; ///< guards the fields below
     Index _index; ///< null until names are known
+    std::shared_ptr<const TagIndex> _tags; ///< null until tags are searched for
     std::string _query;
     bool _isComplete = false;
 };
 
-IndexedNameSearch::IndexedNameSearch(
-    std::shared_ptr<platform::Dispatch> dispatch, std::shared_ptr<const MimeTypeRegistry> types)
-    : _store(std::make_shared<Store>(std::move(dispatch), std::move(types)))
+IndexedNameSearch::IndexedNameSearch(std::shared_ptr<platform::Dispatch> dispatch,
+    std::shared_ptr<const MimeTypeRegistry> types, const Tags& tags)
+    : _store(std::make_shared<Store>(std::move(dispatch), std::move(types), tags))
 {
 }
 

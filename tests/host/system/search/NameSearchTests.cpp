@@ -11,6 +11,7 @@
 #include <gmock/gmock.h>
 
 #include <filesystem>
+#include <map>
 
 namespace {
 
@@ -109,7 +110,16 @@ protected:
 
     testing_support::TemporaryDirectory folder;
     std::shared_ptr<testing_support::VirtualDispatch> dispatch = testing_support::VirtualDispatch::create();
-    IndexedNameSearch search{dispatch, std::make_shared<host::system::MimeTypeRegistry>()};
+    /// The tags of items, by their paths; a promise has an asterisk.
+    std::map<std::string, Names> tags;
+    int looks = 0; ///< how many items were asked for their tags
+    IndexedNameSearch search{dispatch, std::make_shared<host::system::MimeTypeRegistry>(),
+        {[this](const std::string& path, bool isPromise) {
+             ++looks;
+             const auto found = tags.find(path.substr(folder.at("").size()) + (isPromise ? "*" : ""));
+             return found == tags.end() ? Names() : found->second;
+         },
+            {"tag:", "Etikett:"}}};
     std::shared_ptr<platform::NameSearchSession> session;
     NameSearchResults results;
     int updates = 0;
@@ -162,6 +172,46 @@ TEST_F(NameSearchTests, FollowsChangesWhileItGoesOn)
     folder.write("a/plan 3.txt", "");
     dispatch->advance(10);
     EXPECT_EQ(updates, ended);
+}
+
+TEST_F(NameSearchTests, FindsItemsByTheirTags)
+{
+    for (const auto* name : {"a/one.txt", "a/deep/two.txt", "a/red.txt", "a/.away.txt.trwpromise"})
+        folder.write(name, "");
+    tags = {{"a/one.txt", {"Work", "Reddish"}}, {"a/deep/two.txt", {"Red"}}, {"a/deep", {"Café two"}},
+        {"a/away.txt*", {"Réd"}}};
+    begin({"a"});
+    EXPECT_THAT(search_("red"), ElementsAre("a/red.txt"));
+    EXPECT_EQ(looks, 0) << "a search for names looks at no tags";
+    struct Row {
+        const char* query;
+        Names found;
+    };
+    for (const auto& [query, found] : {Row{"tag:red", {"a/deep/two.txt", "a/away.txt*", "a/one.txt"}},
+             {"TAG: Work", {"a/one.txt"}}, {"etikett:CAFE T", {"a/deep"}}, {"tag:ed", {}}, {"tag:two", {}},
+             {"tag:", {"a/one.txt", "a/deep/two.txt", "a/deep", "a/away.txt*"}}}) {
+        SCOPED_TRACE(query);
+        EXPECT_THAT(search_(query), UnorderedElementsAreArray(found));
+        EXPECT_TRUE(results.isComplete && results.isForTag);
+        EXPECT_EQ(results.total, found.size());
+        EXPECT_EQ(results.query, query);
+    }
+    search_("tag:red");
+    EXPECT_EQ(shown().back(), "a/one.txt") << "a tag of just this name counts more";
+
+    // New tags do not show in the folder.
+    tags["a/red.txt"] = {"Red"};
+    dispatch->advance(2.1);
+    EXPECT_THAT(shown(), Contains("a/red.txt"));
+    folder.write("a/new.txt", "");
+    tags["a/new.txt"] = {"Red"};
+    dispatch->advance(2.1);
+    EXPECT_THAT(shown(), Contains("a/new.txt"));
+    search_("red");
+    dispatch->advance(10);
+    const int before = looks;
+    dispatch->advance(10);
+    EXPECT_EQ(looks, before) << "nobody asks for tags any more";
 }
 
 TEST_F(NameSearchTests, AnswersTheLatestQueryAlone)
