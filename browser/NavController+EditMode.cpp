@@ -59,6 +59,24 @@ void NavController::initNewListController(const List& list)
     configureToolbar(list);
     list->setDelegate(self());
     showRunningChanges(list);
+    MenuEnableChecks::lookUpPlaceOf(
+        list, weakly(this, &NavController::placeBecameKnown, std::weak_ptr(list)));
+}
+
+void NavController::placeBecameKnown(const std::weak_ptr<DocumentListController>& known)
+{
+    const auto list = known.lock();
+    if (_editMode && list == topViewController()) {
+        enableNewFolder(*list);
+        updateStatusUI(list);
+    }
+}
+
+void NavController::enableNewFolder(const DocumentListController& list) const
+{
+    if (_barButtonNewFolder)
+        _barButtonNewFolder->setEnabled(MenuEnableChecks::isPlaceKnown(list)
+            && MenuEnableChecks::canEnableNewFolderForSelectedItems(list));
 }
 
 void NavController::configureNavBar(const List& list)
@@ -150,10 +168,12 @@ void NavController::updateStatusUI(const List& list)
     if (!_editMode)
         return;
     shown->setTitle(selectionTitle(shown->selectedItemCount()));
+    // The rules do not look at the disk here. The buttons are enabled as soon as the place is known.
+    const bool isKnown = MenuEnableChecks::isPlaceKnown(*shown);
     if (_barButtonMoveItem)
-        _barButtonMoveItem->setEnabled(MenuEnableChecks::canShowMoveForSelectedItems(*shown));
+        _barButtonMoveItem->setEnabled(isKnown && MenuEnableChecks::canShowMoveForSelectedItems(*shown));
     if (_barButtonDeleteItem)
-        _barButtonDeleteItem->setEnabled(MenuEnableChecks::canShowDeleteForSelectedItems(*shown));
+        _barButtonDeleteItem->setEnabled(isKnown && MenuEnableChecks::canShowDeleteForSelectedItems(*shown));
 }
 
 void NavController::beginEditMode(const Sender&)
@@ -193,8 +213,8 @@ void NavController::setEditModeAndUpdateUIForViewController(bool editMode, const
     if (list)
         list->setEditingAnimated(editMode, true);
     configureVisibleControllerForMode();
-    if (_editMode && list && _barButtonNewFolder)
-        _barButtonNewFolder->setEnabled(MenuEnableChecks::canEnableNewFolderForSelectedItems(*list));
+    if (_editMode && list)
+        enableNewFolder(*list);
 }
 
 void NavController::configureVisibleControllerForMode()

@@ -107,13 +107,13 @@ void NavController::documentListControllerPerformActionURLOriginatingViewComplet
         return;
     case DocumentListAction::Info:
         op.userAction("DLC Action Info");
-        performInfo(url);
-        break;
+        performInfo(url, completion);
+        return;
     case DocumentListAction::Rename:
         op.userAction("DLC Action Rename");
         op.info("Rename action: %@", url);
-        showRenamePrompt(url);
-        break;
+        askForName(url, completion);
+        return;
     case DocumentListAction::Share:
         op.userAction("DLC Action Share (share sheet)");
         op.info("Activity (share) action: %@", url);
@@ -124,9 +124,10 @@ void NavController::documentListControllerPerformActionURLOriginatingViewComplet
         op.userAction("DLC Action Move");
         op.info("Move action: %@", url);
         // What a search found lies in another folder than the list's.
-        showMoveTargetForItemsInFolder(
-            {url}, list && !isSearchPresented() ? list->presentedURL() : url.deletingLastPathComponent());
-        break;
+        askForTarget({url},
+            list && !isSearchPresented() ? list->presentedURL() : url.deletingLastPathComponent(),
+            completion);
+        return;
     case DocumentListAction::PressurePop:
         op.userAction("DLC Action Firmtap Pop");
         op.info("Preview action: %@", url);
@@ -147,14 +148,18 @@ void NavController::performDelete(
         {url}, originatingView, nullptr, [completion] { call(completion); });
 }
 
-void NavController::performInfo(const Url& url)
+void NavController::performInfo(const Url& url, const Completion& completion)
 {
     static constexpr Operation op{
         "-[NavController documentListController:performAction:URL:originatingView:completion:]"};
     op.info("Info action: %@", url);
-    const auto item = DRItem::initWithURL(url);
-    op.info("Info action item: %@", item ? item->description() : "(null)");
-    showPreviewPreviewMode(item, PreviewModeDetails);
+    lookThen([url] { return DRItem::initWithURL(url); },
+        [completion](NavController& self, const std::shared_ptr<DRItem>& item) {
+            op.info("Info action item: %@", item ? item->description() : "(null)");
+            self.showPreviewPreviewMode(item, PreviewModeDetails);
+            call(completion);
+        },
+        completion);
 }
 
 void NavController::promtForNewFolderAndCreate(const Sender&)
@@ -250,20 +255,45 @@ void NavController::showMoveTargetForSelectedItems(const Sender&)
 void NavController::showMoveTargetForItemsInFolder(
     const std::vector<Url>& items, const std::optional<Url>& folder)
 {
+    askForTarget(items, folder, {});
+}
+
+void NavController::askForTarget(
+    const std::vector<Url>& items, const std::optional<Url>& folder, const Completion& completion)
+{
+    const auto look = [items, folder] {
+        MoveFacts facts;
+        facts.holdsSpecialFolder = MenuEnableChecks::isDesktopOrDocumentsInURLArray(items);
+        facts.mayLeaveContainer = !facts.holdsSpecialFolder && trw_canCrossZoneMoveURLs(items);
+        facts.hasOtherFolder =
+            facts.mayLeaveContainer || !folder || MenuEnableChecks::containerHasSubfolders(*folder);
+        return facts;
+    };
+    lookThen(
+        look,
+        [items, folder, completion](NavController& self, const MoveFacts& facts) {
+            self.showMoveTarget(items, folder, facts);
+            call(completion);
+        },
+        completion);
+}
+
+void NavController::showMoveTarget(
+    const std::vector<Url>& items, const std::optional<Url>& folder, const MoveFacts& facts)
+{
     static constexpr Operation op{"-[NavController showMoveTargetForItems:inFolder:]"};
-    if (MenuEnableChecks::isDesktopOrDocumentsInURLArray(items)) {
+    if (facts.holdsSpecialFolder) {
         op.warning("Not moving items with special folder: %@", items);
         UIUtils::showUnsupportedError(visibleViewController());
         return;
     }
     op.info("Prompting for Move Target, %d items", items.size());
-    const bool mayLeave = trw_canCrossZoneMoveURLs(items);
-    if (!mayLeave && folder && !MenuEnableChecks::containerHasSubfolders(*folder)) {
+    if (!facts.hasOtherFolder) {
         showNewFolderPromptDuringMoveItemsToMove(folder, items);
         return;
     }
     const auto picker = MoveTargetPicker::initWithItemsScope(
-        items, mayLeave ? MoveTargetScope::AllContainers : MoveTargetScope::Container);
+        items, facts.mayLeaveContainer ? MoveTargetScope::AllContainers : MoveTargetScope::Container);
     picker->setDelegate(self());
     _moveAsked.emplace();
     picker->setPresentationStyle(kit::PresentationStyle::OverCurrentContext);
@@ -322,16 +352,36 @@ void NavController::moveItemsToDirectoryAndShowErrorsToDirectory(
 
 void NavController::showRenamePrompt(const Url& url)
 {
+    askForName(url, {});
+}
+
+void NavController::askForName(const Url& url, const Completion& completion)
+{
+    struct Facts {
+        std::shared_ptr<DRItem> item;
+        bool isSpecialFolder;
+    };
+    lookThen(
+        [url] {
+            return Facts{DRItem::initWithURL(url), trw_isDesktopOrDocumentsFolder(url)};
+        },
+        [url, completion](NavController& self, const Facts& facts) {
+            if (facts.item)
+                self.showNamePrompt(url, *facts.item, facts.isSpecialFolder);
+            call(completion);
+        },
+        completion);
+}
+
+void NavController::showNamePrompt(const Url& url, const DRItem& item, bool isSpecialFolder)
+{
     static constexpr Operation op{"-[NavController showRenamePrompt:]"};
-    const auto item = DRItem::initWithURL(url);
-    if (!item)
-        return;
-    if (trw_isDesktopOrDocumentsFolder(url)) {
+    if (isSpecialFolder) {
         op.warning("Not renaming special folder: %@", url);
         UIUtils::showUnsupportedError(visibleViewController());
         return;
     }
-    _folderPromptAlert = RenamePrompt::newWithFilenameCompletion(item->localizedName(),
+    _folderPromptAlert = RenamePrompt::newWithFilenameCompletion(item.localizedName(),
         [weak = std::weak_ptr(self()), url, asked = AccountSession()](
             const std::string& name, bool&) -> std::string {
             if (name.empty() || !asked.isCurrent())
@@ -384,14 +434,34 @@ void NavController::showWarningAndDeleteURLsUsingViewWithDocumentListControllerF
         call(finished);
         return;
     }
-    if (MenuEnableChecks::isDesktopOrDocumentsInURLArray(urls)) {
-        op.warning("Not deleting special folder: %@", urls);
-        call(finished);
-        UIUtils::showUnsupportedError(visibleViewController());
-        return;
-    }
-    UIUtils::showDeleteWarningAlertHasContainerViewControllerUsingViewUsingButtonCompletion(urls,
-        libraries != 0, visibleViewController(), view, _barButtonDeleteItem,
+    struct Facts {
+        bool holdsSpecialFolder;
+        std::optional<std::string> message;
+    };
+    const auto look = [urls] {
+        const bool holdsSpecialFolder = MenuEnableChecks::isDesktopOrDocumentsInURLArray(urls);
+        const bool asks = !holdsSpecialFolder && !urls.empty();
+        return Facts{holdsSpecialFolder, asks ? UIUtils::messageForDeletePrompt(urls) : std::nullopt};
+    };
+    lookThen(
+        look,
+        [urls, view, list, finished](NavController& self, const Facts& facts) {
+            if (!facts.holdsSpecialFolder)
+                return self.askBeforeDeletion(facts.message, urls, view, list, finished);
+            op.warning("Not deleting special folder: %@", urls);
+            call(finished);
+            UIUtils::showUnsupportedError(self.visibleViewController());
+        },
+        finished);
+}
+
+void NavController::askBeforeDeletion(const std::optional<std::string>& message, const std::vector<Url>& urls,
+    const std::shared_ptr<kit::View>& view, const List& list, const Completion& finished)
+{
+    static constexpr Operation op{
+        "-[NavController showWarningAndDeleteURLs:usingView:withDocumentListController:finishedCompletion:]"};
+    UIUtils::showDeleteWarningAlertMessageViewControllerUsingViewUsingButtonCompletion(message,
+        visibleViewController(), view, _barButtonDeleteItem,
         [browser = self(), urls, list, finished, asked = AccountSession()](const auto&, bool cancelled) {
             op.userAction(cancelled ? "Delete was Cancelled (nav)" : "Delete was Confirmed (nav)");
             const bool isConfirmed = !cancelled && asked.isCurrent();

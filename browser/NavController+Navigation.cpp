@@ -50,6 +50,18 @@ std::string described(const std::shared_ptr<DRItem>& item)
     return item ? item->description() : "(null)";
 }
 
+} // namespace
+
+/// What is known of an item that was tapped.
+struct NavController::PickedItem {
+    std::shared_ptr<DRItem> item; ///< null: it is gone
+    std::shared_ptr<DRItem> target; ///< the item itself, or where a link leads; null: nowhere in the drive
+    std::string refusal; ///< says why a link cannot be followed
+    LaunchUtils::DocumentFacts launch;
+};
+
+namespace {
+
 /// Says where a symbolic link leads.
 struct LinkTarget {
     enum class Place { InDrive, OutsideDrive, Nowhere };
@@ -162,6 +174,7 @@ bool NavController::isSearchPresented() const
 
 void NavController::endEverythingPresented()
 {
+    _look->forget();
     screens::endPresented(*this);
 }
 
@@ -255,10 +268,33 @@ void NavController::documentListControllerDidSelectItemAtURL(const List&, const 
     static constexpr Operation op{"-[NavController documentListController:didSelectItemAtURL:]"};
     op.userAction("Selected Item (dlc)");
     op.info("Picked URL: %@", url);
-    auto item = DRItem::initWithURL(url);
-    op.debug("DRItem: %@ (%{public}@ bytes %{public}@)", described(item),
-        item ? item->fileSize() : std::nullopt, url.pathExtension());
-    if (!item) {
+    lookThen([url, follows = !_editMode] { return lookAtPicked(url, follows); },
+        [url](NavController& self, const PickedItem& picked) { self.openPicked(url, picked); }, {});
+}
+
+/// Looks at an item that was tapped and, for a link, at where it leads.
+NavController::PickedItem NavController::lookAtPicked(const Url& url, bool followsLinks)
+{
+    static constexpr Operation op{"-[NavController documentListController:didSelectItemAtURL:]"};
+    PickedItem picked{DRItem::initWithURL(url), {}, {}, {}};
+    picked.target = picked.item;
+    if (picked.item && picked.item->isSymlink() && followsLinks) {
+        auto target = followLink(*picked.item, op);
+        picked.target = std::move(target.item);
+        if (!picked.target)
+            picked.refusal = refusal(target.place, url);
+    }
+    if (picked.target)
+        picked.launch = LaunchUtils::factsOf(picked.target->url());
+    return picked;
+}
+
+void NavController::openPicked(const Url& url, const PickedItem& picked)
+{
+    static constexpr Operation op{"-[NavController documentListController:didSelectItemAtURL:]"};
+    op.debug("DRItem: %@ (%{public}@ bytes %{public}@)", described(picked.item),
+        picked.item ? picked.item->fileSize() : std::nullopt, url.pathExtension());
+    if (!picked.item) {
         showVanishedItem(url);
         return;
     }
@@ -266,17 +302,13 @@ void NavController::documentListControllerDidSelectItemAtURL(const List&, const 
         op.debug("DLC Selection not allowed while in edit mode");
         return;
     }
-    if (item->isSymlink()) {
-        auto target = followLink(*item, op);
-        if (!target.item)
-            return tell(refusal(target.place, url));
-        item = std::move(target.item);
-    }
-    if (item->isDirectory()) {
-        op.debug("Building DLC stack for symlink to %@", item->url());
-        openFolder(item->url(), op);
+    if (!picked.target)
+        return tell(picked.refusal);
+    if (picked.target->isDirectory()) {
+        op.debug("Building DLC stack for symlink to %@", picked.target->url());
+        openFolder(picked.target->url(), op);
     } else {
-        openDocument(item, op);
+        openDocument(picked.target, picked.launch, op);
     }
 }
 
@@ -296,10 +328,12 @@ void NavController::openFolder(const Url& url, const Operation& op)
         op.error("Couldn't build DLC stack for %@. Not switching to folder", url);
 }
 
-void NavController::openDocument(const std::shared_ptr<DRItem>& item, const Operation& op)
+void NavController::openDocument(
+    const std::shared_ptr<DRItem>& item, const LaunchUtils::DocumentFacts& facts, const Operation& op)
 {
     _recentDocument.opened(*item);
-    if (LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(item->url(), topViewController(), true)) {
+    if (LaunchUtils::openInDefaultAppFactsViewControllerRequireOpenIn(
+            item->url(), facts, topViewController(), true)) {
         op.debug("openInDefaultApp returned YES, app launched");
         return;
     }

@@ -3,11 +3,14 @@
 
 #pragma once
 
+#include "browser/LatestLook.h"
 #include "browser/RecentDocument.h"
 #include "items/AccountSession.h"
+#include "items/LaunchUtils.h"
 #include "kit/controllers/NavigationController.h"
 #include "platform/Date.h"
 #include "platform/NotificationCenter.h"
+#include "platform/Weakly.h"
 #include "prompts/DocumentListControllerStatusBar.h"
 #include "prompts/QuotaFetcher.h"
 #include "screens/DocumentInteractionSheet.h"
@@ -226,10 +229,30 @@ private:
     void endChoiceOfItems();
     void showVanishedItem(const platform::Url& url);
     void openFolder(const platform::Url& url, const platform::Operation& op);
-    void openDocument(const std::shared_ptr<DRItem>& item, const platform::Operation& op);
+    struct PickedItem;
+    static PickedItem lookAtPicked(const platform::Url& url, bool followsLinks);
+    void openPicked(const platform::Url& url, const PickedItem& picked);
+    void openDocument(const std::shared_ptr<DRItem>& item, const LaunchUtils::DocumentFacts& facts,
+        const platform::Operation& op);
     void performDelete(
         const platform::Url& url, const std::shared_ptr<kit::View>& view, const Completion& completion);
-    void performInfo(const platform::Url& url);
+    void performInfo(const platform::Url& url, const Completion& completion);
+    /// Looks at the disk on another thread and goes on with what was found, unless a person has asked for
+    /// something else since or has left the screen. `dropped` is called in that case.
+    template <typename Look, typename Then>
+    void lookThen(Look look, Then then, const Completion& dropped);
+    /// What has to be known before items are moved.
+    struct MoveFacts {
+        bool holdsSpecialFolder = false, mayLeaveContainer = false, hasOtherFolder = true;
+    };
+    void askForTarget(const std::vector<platform::Url>& items, const std::optional<platform::Url>& folder,
+        const Completion& completion);
+    void showMoveTarget(const std::vector<platform::Url>& items, const std::optional<platform::Url>& folder,
+        const MoveFacts& facts);
+    void askForName(const platform::Url& url, const Completion& completion);
+    void showNamePrompt(const platform::Url& url, const DRItem& item, bool isSpecialFolder);
+    void askBeforeDeletion(const std::optional<std::string>& message, const std::vector<platform::Url>& urls,
+        const std::shared_ptr<kit::View>& view, const List& list, const Completion& finished);
     /// Dims the rows of a change's items and shows its progress from now on.
     void changeBegun(const std::shared_ptr<ItemChange>& change);
     /// Some change has ended.
@@ -245,6 +268,8 @@ private:
 
     Sender makeToolbarButton(const std::string& title, void (NavController::*operation)(const Sender&));
     void configureEditToolbar(const List& list);
+    void placeBecameKnown(const std::weak_ptr<screens::DocumentListController>& known);
+    void enableNewFolder(const screens::DocumentListController& list) const;
 
     std::shared_ptr<kit::BarButtonItem> _barButtonNewFolder, _barButtonMoveItem, _barButtonDeleteItem;
     std::shared_ptr<screens::DocumentInteractionSheet> _documentInteractionController;
@@ -263,8 +288,22 @@ private:
     std::uint64_t _quotaBytes = 0;
     RecentDocument _recentDocument;
     std::optional<AccountSession> _moveAsked; ///< who was asked last for the destination of a move
+    const std::shared_ptr<LatestLook> _look = std::make_shared<LatestLook>();
     std::shared_ptr<RunningChanges> _runningChanges; ///< null before the first change
     std::vector<platform::Observation> _observations;
 };
+
+template <typename Look, typename Then>
+void NavController::lookThen(Look look, Then then, const Completion& dropped)
+{
+    const auto top = std::weak_ptr(topViewController());
+    const auto found = [then = std::move(then), top, dropped](NavController& self, const auto& facts) {
+        if (self.topViewController() == top.lock())
+            then(self, facts);
+        else if (dropped)
+            dropped();
+    };
+    _look->begin(std::move(look), platform::weakly(this, found), dropped);
+}
 
 } // namespace tarrow

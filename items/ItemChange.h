@@ -59,7 +59,7 @@ public:
     void cancel() { _isCancelled = true; }
     bool isCancelled() const { return _isCancelled; }
     /// Answers whether the change shall go on. It reads who is signed in.
-    bool isWanted() const { return !_isCancelled && _asked.isCurrent(); }
+    bool isWanted() const { return !_isCancelled && _asked.isSignedIn(); }
     /// Calls a function for each item, one after the other, until the change is not wanted any more, and
     /// answers its errors. A failure does not end it. On the queue.
     std::vector<Error> forEachItem(const std::function<std::optional<Error>(const Url& item)>& step);

@@ -98,6 +98,17 @@ std::optional<AppHandle> appInLibrary(const DocumentContainer& container, const 
     return std::nullopt;
 }
 
+std::optional<AppHandle> defaultApp(const LaunchUtils::DocumentFacts& facts, bool requireOpenIn)
+{
+    if (!facts.exists)
+        defaultAppOperation.debug("Assuming apps can open a promised document...");
+    if (!facts.resolved)
+        return std::nullopt;
+    if (facts.isInDefaultContainer)
+        return appInDefaultContainer(*facts.resolved, requireOpenIn);
+    return facts.library ? appInLibrary(*facts.library, *facts.resolved) : std::nullopt;
+}
+
 } // namespace
 
 bool LaunchUtils::isUrlInDefaultContainer(const Url& url)
@@ -125,18 +136,20 @@ std::vector<AppHandle> LaunchUtils::availableAppsForDoc(const platform::Document
     return fit;
 }
 
+LaunchUtils::DocumentFacts LaunchUtils::factsOf(const Url& url)
+{
+    DocumentFacts facts{
+        FileUtils::exists(url), trw_URLByResolvingBookmark(url), isUrlInDefaultContainer(url), {}};
+    const auto identifier =
+        facts.isInDefaultContainer ? std::nullopt : containers().containerIdentifierInURL(url);
+    if (identifier)
+        facts.library = containers().containerWithIdentifier(*identifier);
+    return facts;
+}
+
 std::optional<AppHandle> LaunchUtils::defaultAppForDocumentRequireOpenIn(const Url& url, bool requireOpenIn)
 {
-    if (!FileUtils::exists(url))
-        defaultAppOperation.debug("Assuming apps can open a promised document...");
-    const auto resolved = trw_URLByResolvingBookmark(url);
-    if (!resolved)
-        return std::nullopt;
-    if (isUrlInDefaultContainer(url))
-        return appInDefaultContainer(*resolved, requireOpenIn);
-    const auto identifier = containers().containerIdentifierInURL(url);
-    const auto container = identifier ? containers().containerWithIdentifier(*identifier) : nullptr;
-    return container ? appInLibrary(*container, *resolved) : std::nullopt;
+    return defaultApp(factsOf(url), requireOpenIn);
 }
 
 std::optional<std::string> LaunchUtils::defaultAppNameForDocumentRequireOpenIn(
@@ -149,16 +162,22 @@ std::optional<std::string> LaunchUtils::defaultAppNameForDocumentRequireOpenIn(
 bool LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(
     const Url& url, const std::shared_ptr<kit::ViewController>& viewController, bool requireOpenIn)
 {
+    return openInDefaultAppFactsViewControllerRequireOpenIn(url, factsOf(url), viewController, requireOpenIn);
+}
+
+bool LaunchUtils::openInDefaultAppFactsViewControllerRequireOpenIn(const Url& url, const DocumentFacts& facts,
+    const std::shared_ptr<kit::ViewController>& viewController, bool requireOpenIn)
+{
     static constexpr Operation op{"+[LaunchUtils openInDefaultApp:viewController:requireOpenIn:]"};
     op.info("Opening document %@ in default app", url);
-    const auto app = defaultAppForDocumentRequireOpenIn(url, requireOpenIn);
-    const auto resolved = app ? trw_URLByResolvingBookmark(url) : std::nullopt;
-    if (!resolved)
+    const auto app = defaultApp(facts, requireOpenIn);
+    if (!app)
         return false;
     // The flag is shared, because the action may run after this call has returned.
     const auto opened = std::make_shared<bool>(false);
-    DocumentListController::openOutOfDriveViewControllerAction(*resolved, viewController, [=] {
-        const auto sheet = DocumentInteractionSheet::interactionControllerWithURL(*resolved);
+    const auto& resolved = *facts.resolved;
+    DocumentListController::openOutOfDriveViewControllerAction(resolved, viewController, [=] {
+        const auto sheet = DocumentInteractionSheet::interactionControllerWithURL(resolved);
         *opened = sheet->openDocumentInPlaceInApp(*app);
     });
     return *opened;

@@ -25,10 +25,23 @@ public:
 
     LaunchUtils() = delete;
 
+    /// What the disk says about a document that may be opened in an app.
+    struct DocumentFacts {
+        bool exists = false;
+        std::optional<Url> resolved; ///< absent for a reference that cannot be read
+        bool isInDefaultContainer = false;
+        std::shared_ptr<const DocumentContainer> library; ///< null in the default container
+    };
+    /// Looks them up. Any thread.
+    static DocumentFacts factsOf(const Url& url);
+
     /// Opens a document in its default app and answers whether it did. The platform may first ask on the
     /// screen.
     static bool openInDefaultAppViewControllerRequireOpenIn(
         const Url& url, const std::shared_ptr<kit::ViewController>& viewController, bool requireOpenIn);
+    /// Does the same with facts that are known already, and looks at nothing.
+    static bool openInDefaultAppFactsViewControllerRequireOpenIn(const Url& url, const DocumentFacts& facts,
+        const std::shared_ptr<kit::ViewController>& viewController, bool requireOpenIn);
 
     /// Answers the app that opens a document, promised or here, or nothing. Images, movies, sounds and PDF
     /// documents of the default container have none. In an app library the library's own app comes before

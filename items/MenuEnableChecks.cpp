@@ -6,7 +6,9 @@
 #include "items/DRItem.h"
 #include "items/FileUtils.h"
 #include "items/UrlResolution.h"
+#include "platform/Dispatch.h"
 #include "platform/FileSystem.h"
+#include "platform/Weakly.h"
 #include "screens/list/DocumentListController.h"
 
 #include <algorithm>
@@ -21,24 +23,48 @@ using Container = std::shared_ptr<const DocumentContainer>;
 using platform::FileSystem;
 using platform::FileType;
 
+constexpr auto associationKey = "_TarrowDrivePlaceOfList";
+
 /// The container of the folder that a list shows, and the number of folders between its documents folder and
-/// the list's. When the container cannot be found it is null, and a line is logged.
+/// the list's. When the container cannot be found it is null.
 struct Place {
-    Container container;
+    Container container{};
     std::size_t depth = 0;
+    std::optional<Error> error{};
 };
+
+Place lookUpPlace(const std::optional<Url>& url)
+{
+    Place place;
+    std::optional<std::vector<std::string>> names;
+    if (url)
+        place.error = FileUtils::containerAndRelativePathforURLContainerRelativePathComponents(
+            *url, &place.container, &names);
+    if (place.error)
+        place.container = nullptr;
+    place.depth = names ? names->size() : 0;
+    return place;
+}
+
+/// Answers the place of a list's folder. A line is logged when it has no container.
 Place placeOf(const MenuEnableChecks::List& list, const Operation& op)
 {
-    const auto& url = list.presentedURL();
-    Container container;
-    std::optional<std::vector<std::string>> names;
-    const auto error = url
-        ? FileUtils::containerAndRelativePathforURLContainerRelativePathComponents(*url, &container, &names)
-        : std::nullopt;
-    if (!error && container)
-        return {container, names ? names->size() : 0};
-    op.error("Couldn't get container for URL %@: %@", url, error);
-    return {};
+    const auto known = list.associatedObject<Place>(associationKey);
+    const auto place = known ? *known : lookUpPlace(list.presentedURL());
+    if (!place.container)
+        op.error("Couldn't get container for URL %@: %@", list.presentedURL(), place.error);
+    return place;
+}
+
+/// Answers whether a selection of a list holds a special folder.
+bool holdsSpecialFolder(const MenuEnableChecks::List& list, const std::vector<Url>& selection)
+{
+    const auto known = list.associatedObject<Place>(associationKey);
+    if (!known)
+        return MenuEnableChecks::isDesktopOrDocumentsInURLArray(selection);
+    return known->container && std::ranges::any_of(selection, [&](const Url& url) {
+        return trw_isDesktopOrDocumentsFolderIn(*known->container, url);
+    });
 }
 
 /// Answers whether a list may show special folders or containers, which only lie at the top of a container.
@@ -86,6 +112,26 @@ bool hasFolder(const Url& documents)
 
 } // namespace
 
+void MenuEnableChecks::lookUpPlaceOf(const std::shared_ptr<List>& list, std::function<void()> done)
+{
+    const auto keep = [done = std::move(done)](List& self, const std::shared_ptr<Place>& place) {
+        self.setAssociatedObject(associationKey, place);
+        done();
+    };
+    auto& dispatch = services().dispatch();
+    const auto queue = dispatch.makeSerialQueue("TarrowDriveAppID.places");
+    // The work keeps its queue.
+    queue->async(
+        [queue, url = list->presentedURL(), main = dispatch.mainQueue(), weak = std::weak_ptr(list), keep] {
+            main->async(platform::weakly(weak, keep, std::make_shared<Place>(lookUpPlace(url))));
+        });
+}
+
+bool MenuEnableChecks::isPlaceKnown(const List& list)
+{
+    return list.associatedObject<Place>(associationKey) != nullptr;
+}
+
 std::size_t MenuEnableChecks::numContainersInURLArray(const std::vector<Url>& urls)
 {
     const auto& containers = services().cloudDocumentService().containers();
@@ -113,12 +159,12 @@ bool MenuEnableChecks::canShowMoveForSelectedItems(const List& list)
 {
     if (list.selectedItemCount() == 0)
         return false;
-    const auto isSpecial = [](const std::vector<Url>& selection) {
-        return isDesktopOrDocumentsInURLArray(selection) || numContainersInURLArray(selection) > 0;
+    const auto isSpecial = [&](const std::vector<Url>& selection) {
+        return holdsSpecialFolder(list, selection) || numContainersInURLArray(selection) > 0;
     };
     if (mayShowSpecialItems(list) && isSpecial(list.selectedItems()))
         return false;
-    return containerSupportsAnyDepth(list) || numFoldersInURLArray(list.selectedItems()) == 0;
+    return containerSupportsAnyDepth(list) || !list.selectionHoldsFolder();
 }
 
 bool MenuEnableChecks::canShowDeleteForSelectedItems(const List& list)
@@ -128,7 +174,7 @@ bool MenuEnableChecks::canShowDeleteForSelectedItems(const List& list)
     if (!mayShowSpecialItems(list))
         return true;
     const auto selection = list.selectedItems();
-    if (isDesktopOrDocumentsInURLArray(selection))
+    if (holdsSpecialFolder(list, selection))
         return false;
     const auto containers = numContainersInURLArray(selection);
     return containers == 0 || containers == selection.size();
@@ -137,7 +183,7 @@ bool MenuEnableChecks::canShowDeleteForSelectedItems(const List& list)
 bool MenuEnableChecks::canEnableNewFolderForSelectedItems(const List& list)
 {
     static constexpr Operation op{"+[MenuEnableChecks canEnableNewFolderForSelectedItems:]"};
-    const auto [container, depth] = placeOf(list, op);
+    const auto [container, depth, error] = placeOf(list, op);
     if (!container)
         return false;
     const auto& [identifier, levels] = std::tie(container->identifier, container->supportedFolderLevels);

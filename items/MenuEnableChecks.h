@@ -6,6 +6,8 @@
 #include "items/PlatformNames.h"
 
 #include <cstddef>
+#include <functional>
+#include <memory>
 #include <vector>
 
 namespace screens {
@@ -23,6 +25,12 @@ public:
     using List = screens::DocumentListController;
 
     MenuEnableChecks() = delete;
+
+    /// Looks up on another thread what the first four questions need to know of a list's folder, keeps it
+    /// with the list, and calls `done`. Without it they look at the disk themselves.
+    static void lookUpPlaceOf(const std::shared_ptr<List>& list, std::function<void()> done);
+    /// Answers whether that is known, so that the questions are answered from memory.
+    static bool isPlaceKnown(const List& list);
 
     /// Answers whether the selection holds an item that may be moved. In a container that limits its folders,
     /// only files may be moved.

@@ -19,6 +19,12 @@ platform::DocumentContainers& containers()
     return services().cloudDocumentService().containers();
 }
 
+bool hasPathOfSpecialFolder(const Url& url)
+{
+    const auto path = containers().pathRelativeToSyncedRoot(url);
+    return path == "BrindleDefault/Documents" || path == "BrindleDefault/Desktop";
+}
+
 } // namespace
 
 std::optional<Url> trw_URLByResolvingBookmark(const Url& url)
@@ -42,11 +48,16 @@ Url trw_URLByResolvingAlias(const Url& url)
 
 bool trw_isDesktopOrDocumentsFolder(const Url& url)
 {
-    const auto container = containers().containerForItem(url);
-    if (!container || !*container || (*container)->identifier != containers().defaultContainerIdentifier())
+    // The path is compared first, because the container is looked up on the disk.
+    if (!hasPathOfSpecialFolder(url))
         return false;
-    const auto path = containers().pathRelativeToSyncedRoot(url);
-    return path == "BrindleDefault/Documents" || path == "BrindleDefault/Desktop";
+    const auto container = containers().containerForItem(url);
+    return container && *container && trw_isDesktopOrDocumentsFolderIn(**container, url);
+}
+
+bool trw_isDesktopOrDocumentsFolderIn(const DocumentContainer& container, const Url& url)
+{
+    return container.identifier == containers().defaultContainerIdentifier() && hasPathOfSpecialFolder(url);
 }
 
 bool trw_canCrossZoneMoveURLs(const std::vector<Url>& urls)

@@ -26,6 +26,8 @@ Url trw_URLByResolvingAlias(const Url& url);
 /// Answers whether this is the Desktop or the Documents folder at the top of the default container. Those two
 /// are never moved, renamed or deleted.
 bool trw_isDesktopOrDocumentsFolder(const Url& url);
+/// Answers the same for an item of a container that was looked up before, without a look at the disk.
+bool trw_isDesktopOrDocumentsFolderIn(const DocumentContainer& container, const Url& url);
 
 /// Answers whether the destinations of a move may include other containers. The first item alone decides.
 bool trw_canCrossZoneMoveURLs(const std::vector<Url>& urls);

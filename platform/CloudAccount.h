@@ -23,6 +23,9 @@ public:
     /// It is nothing when nobody is signed in, and when the account's record cannot be read, which is logged
     /// with the reason. Any thread may ask; each call reads at most one small file.
     virtual std::optional<PropertyValue> identityToken() const = 0;
+    /// Answers what the last call of identityToken() answered, whoever made it: the account that the program
+    /// knows of. It reads only when there was no such call. Any thread.
+    virtual std::optional<PropertyValue> knownIdentityToken() const = 0;
 
     /// Makes an operation, to be put into an operation queue, that asks the account how many bytes are free.
     /// It calls `completion` once, on the thread that runs it, with the number of free bytes, or with the

@@ -9,7 +9,6 @@
 #include "items/DRItem.h"
 #include "kit/controllers/SearchPresentation.h"
 #include "platform/Dispatch.h"
-#include "platform/FileSystem.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/Weakly.h"
@@ -40,9 +39,10 @@ bool hasSomethingToShow(const std::shared_ptr<DRItem>& item)
     return item && (item->isSymlink() || item->resolvedURL());
 }
 
-bool fileExists(const DRItem& item)
+/// Answers whether the item was here when it was read, without another look at the disk.
+bool fileExisted(const DRItem& item)
 {
-    return item.resolvedURL() && services().fileSystem().typeOfItem(item.resolvedURL()->path()).has_value();
+    return item.resolvedURL() && !item.isPromise();
 }
 
 /// Deletes a manager on the main thread. The coordinator holds its presenters while it calls them, so any
@@ -184,7 +184,7 @@ PreviewItemManager::Screen PreviewItemManager::prepareToPreviewItem(const std::s
     }
     _modifiedDate = item->contentModificationDate();
     registerAsFilePresenter();
-    const bool exists = fileExists(*item);
+    const bool exists = fileExisted(*item);
     _detailsViewController = nullptr;
     const bool isQuick = _mode == PreviewModeQuick;
     const auto screen = isQuick ? Screen(createLookwellController()) : Screen(createDetailsViewController());

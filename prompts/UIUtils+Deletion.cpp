@@ -58,7 +58,15 @@ void UIUtils::showDeleteWarningAlertHasContainerViewControllerUsingViewUsingButt
     const std::shared_ptr<kit::View>& view, const std::shared_ptr<kit::BarButtonItem>& button,
     DeleteCompletion completion)
 {
-    const auto message = items.empty() ? std::nullopt : messageForDeletePrompt(items);
+    showDeleteWarningAlertMessageViewControllerUsingViewUsingButtonCompletion(
+        items.empty() ? std::nullopt : messageForDeletePrompt(items), parent, view, button,
+        std::move(completion));
+}
+
+void UIUtils::showDeleteWarningAlertMessageViewControllerUsingViewUsingButtonCompletion(
+    const std::optional<std::string>& message, const Screen& parent, const std::shared_ptr<kit::View>& view,
+    const std::shared_ptr<kit::BarButtonItem>& button, DeleteCompletion completion)
+{
     if (!message || !parent) {
         completion(nullptr, true);
         return;

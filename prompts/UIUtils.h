@@ -88,8 +88,13 @@ public:
         const std::vector<platform::Url>& items, bool hasContainer, const Screen& parent,
         const std::shared_ptr<kit::View>& view, const std::shared_ptr<kit::BarButtonItem>& button,
         DeleteCompletion completion);
+    /// Asks the same with a message that is known already; absent: the completion is called as above.
+    static void showDeleteWarningAlertMessageViewControllerUsingViewUsingButtonCompletion(
+        const std::optional<std::string>& message, const Screen& parent,
+        const std::shared_ptr<kit::View>& view, const std::shared_ptr<kit::BarButtonItem>& button,
+        DeleteCompletion completion);
     /// Answers the message that says what will be lost, or nothing when the one item cannot be read or has no
-    /// name. It reads that item.
+    /// name. It reads that item. Any thread.
     static std::optional<std::string> messageForDeletePrompt(const std::vector<platform::Url>& items);
 
     /// Answers whether the device is a tablet.

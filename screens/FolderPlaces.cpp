@@ -37,6 +37,14 @@ std::optional<Url> rootFolder()
     return std::nullopt;
 }
 
+bool isRootFolder(const Url& folder)
+{
+    // The place is compared first, because the containers are looked up on the disk.
+    return containers().isContainerTopFolder(folder)
+        && containers().containerIdentifierInURL(folder) == containers().defaultContainerIdentifier()
+        && rootFolder() == folder;
+}
+
 std::string folderTitle(const Url& folder)
 {
     constexpr AttributeKey key[] = {AttributeKey::LocalizedName};
@@ -49,7 +57,7 @@ std::string folderTitle(const Url& folder)
 std::vector<FolderSnapshot::ExtraItem> extraItemsOf(const Url& folder)
 {
     std::vector<FolderSnapshot::ExtraItem> libraries;
-    if (rootFolder() != folder)
+    if (!isRootFolder(folder))
         return libraries;
     for (const auto& container : containers().allContainers()) {
         if (!isDefault(*container) && container->documentsURL)

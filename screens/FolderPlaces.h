@@ -17,6 +17,9 @@ namespace screens {
 /// there is none.
 std::optional<Url> rootFolder();
 
+/// Answers whether this is that folder. It looks at the disk only for the top folder of a container.
+bool isRootFolder(const Url& folder);
+
 /// Answers the title of a folder's list. A container's documents folder has the container's name.
 std::string folderTitle(const Url& folder);
 

@@ -84,6 +84,18 @@ std::vector<Url> DocumentListController::selectedItems() const
     return items;
 }
 
+bool DocumentListController::selectionHoldsFolder() const
+{
+    if (selectedItemCount() == 0)
+        return false;
+    const auto& rows = *_contents->rows();
+    for (std::size_t row = 0; row < rows.count(); ++row) {
+        if (_listView->selection().contains(rows.ids()[row]) && opensAsFolder(rows.entry(row).kind))
+            return true;
+    }
+    return false;
+}
+
 void DocumentListController::setSelectedItems(const std::vector<Url>& items)
 {
     if (!_editing || !_contents || !isViewLoaded())
@@ -133,20 +145,28 @@ void DocumentListController::refreshRequested(kit::ListView&)
 
 void DocumentListController::rowActivated(kit::ListView&, std::size_t index)
 {
-    const auto rows = _rows->rows();
-    if (rows && index < rows->count())
-        open(rows->url(index), rows->entry(index).kind);
+    const auto item = itemAt(index);
+    if (!item)
+        return;
+    // The row knows its folder's name, so a tap looks at nothing.
+    if (opensAsFolder(item->kind))
+        openFolder(initWithURLTitle(item->url, item->title));
+    else
+        open(item->url, item->kind);
 }
 
 void DocumentListController::open(const Url& url, FolderEntryKind kind)
 {
-    const auto told = delegate();
-    if (!told)
-        return;
     if (opensAsFolder(kind))
-        told->documentListControllerDidSelectContainerWithViewController(self(), initWithURL(url));
-    else
+        openFolder(initWithURL(url));
+    else if (const auto told = delegate())
         told->documentListControllerDidSelectItemAtURL(self(), url);
+}
+
+void DocumentListController::openFolder(const std::shared_ptr<DocumentListController>& folder)
+{
+    if (const auto told = delegate())
+        told->documentListControllerDidSelectContainerWithViewController(self(), folder);
 }
 
 std::optional<RowItem> DocumentListController::itemAt(std::size_t index) const

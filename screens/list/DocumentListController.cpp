@@ -49,6 +49,12 @@ std::shared_ptr<DocumentListController> DocumentListController::initWithURL(cons
     return std::make_shared<DocumentListController>(url);
 }
 
+std::shared_ptr<DocumentListController> DocumentListController::initWithURLTitle(
+    const Url& url, const std::string& title)
+{
+    return std::make_shared<DocumentListController>(url, title);
+}
+
 std::vector<std::shared_ptr<DocumentListController>> DocumentListController::hierarchyForURL(const Url& url)
 {
     std::vector<std::shared_ptr<DocumentListController>> lists;
@@ -62,6 +68,12 @@ DocumentListController::DocumentListController(std::optional<Url> folder)
 {
     if (_presentedURL)
         setTitle(folderTitle(*_presentedURL));
+}
+
+DocumentListController::DocumentListController(Url folder, const std::string& title)
+    : _presentedURL(std::move(folder))
+{
+    setTitle(title);
 }
 
 DocumentListController::~DocumentListController() = default;
@@ -158,7 +170,7 @@ void DocumentListController::refresh()
 
 void DocumentListController::followLibraries()
 {
-    if (rootFolder() != _presentedURL)
+    if (!isRootFolder(*_presentedURL))
         return;
     _libraries = services().folderLister().list(_presentedURL->deletingLastPathComponent(), {},
         FolderGrouping::FoldersFirst, weakly(this, [](DocumentListController& self) {

@@ -45,13 +45,17 @@ public:
     /// Answers the list of the drive's top level, which shows the app libraries as well, or null when there
     /// is no default container because nobody is signed in.
     static std::shared_ptr<DocumentListController> createRootList();
+    /// Reads the folder's name for the title.
     static std::shared_ptr<DocumentListController> initWithURL(const Url& url);
+    /// Looks at nothing, for a folder whose name is known.
+    static std::shared_ptr<DocumentListController> initWithURLTitle(const Url& url, const std::string& title);
     /// Answers a new list for each folder from the drive's top level down to the given one, in this order.
     /// Answers nothing when the folder lies neither in the default container nor in an app library.
     static std::vector<std::shared_ptr<DocumentListController>> hierarchyForURL(const Url& url);
 
     /// Derived classes call this. Without a folder the list stays empty.
     explicit DocumentListController(std::optional<Url> folder);
+    DocumentListController(Url folder, const std::string& title);
     ~DocumentListController() override;
 
     void setDelegate(std::weak_ptr<DocumentListControllerDelegate> delegate);
@@ -67,6 +71,8 @@ public:
     /// Answers the URLs of the selected items in the order of the list.
     std::vector<Url> selectedItems() const;
     std::size_t selectedItemCount() const;
+    /// Answers whether a folder (packages aside) or a library is among them, as far as the listing knows.
+    bool selectionHoldsFolder() const;
     /// Selects items. URLs that are not items of the list are ignored. Only an editing list selects.
     void setSelectedItems(const std::vector<Url>& items);
 
@@ -150,6 +156,7 @@ private:
     void showLoadingAfterDelay();
     void reportRemovalIfShown();
     void open(const Url& url, FolderEntryKind kind);
+    void openFolder(const std::shared_ptr<DocumentListController>& folder);
     void perform(DocumentListAction action, const Url& url);
     void actionEnded(std::size_t number);
     void dimBusyRows();

@@ -46,6 +46,7 @@ protected:
     {
         browser->showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(
             items, nullptr, topList(), [this] { ++completions; });
+        settle();
     }
     bool isThere(std::string_view path) const { return std::filesystem::exists(url(path).path()); }
     /// Closes the alert on the screen and answers its title; empty without one.
@@ -203,12 +204,14 @@ TEST_F(ItemActionsTest, EditModeOffersItsButtonsByTheSelection)
     EXPECT_EQ(alert()->actions()[1]->title(), "Create");
     EXPECT_EQ(takeAlert(), "New Folder");
     press(browser->barButtonDeleteItem());
+    settle();
     ASSERT_NE(alert(), nullptr);
     EXPECT_EQ(std::get<std::weak_ptr<kit::BarButtonItem>>(alert()->popoverAnchor()).lock(),
         browser->barButtonDeleteItem());
     alert()->userCancelled();
     EXPECT_TRUE(browser->editMode()) << "nothing happened";
     press(browser->barButtonDeleteItem());
+    settle();
     alert()->press(0);
     settle();
     EXPECT_FALSE(isThere("a.txt"));
@@ -227,6 +230,7 @@ TEST_F(ItemActionsTest, ItemsMoveToTheFolderThatIsChosen)
     topList()->setSelectedItems({a, b});
     browser->showMoveTargetForSelectedItems(nullptr);
     EXPECT_FALSE(browser->editMode());
+    settle();
     const auto picker =
         std::dynamic_pointer_cast<screens::MoveTargetPicker>(browser->presentedViewController());
     ASSERT_NE(picker, nullptr);
@@ -257,6 +261,7 @@ TEST_F(ItemActionsTest, WithoutAnyFolderAMoveMakesOne)
     // With one container there is no other folder to move to.
     std::filesystem::remove_all(drive.layout().defaultContainer());
     browser->showMoveTargetForItemsInFolder({note}, documents);
+    settle();
     ASSERT_NE(alert(), nullptr);
     EXPECT_EQ(alert()->title(), "Move 1 Item");
     EXPECT_EQ(enter("Notes"), "");

@@ -6,9 +6,11 @@
 #include "kit/views/Label.h"
 #include "kit/views/ListView.h"
 #include "kit/views/TextField.h"
+#include "platform/Log.h"
 #include "prompts/DriveStatusLabelView.h"
 #include "prompts/FilenamePrompt.h"
 #include "prompts/SimpleTextViewController.h"
+#include "screens/list/DocumentListAction.h"
 #include "screens/list/DocumentListController.h"
 #include "tests/browser/support/BrowserFixture.h"
 
@@ -18,6 +20,7 @@ namespace {
 using namespace testing_support;
 using platform::Notification;
 using platform::Url;
+using screens::DocumentListAction;
 
 /// Something happens while a change that a person has confirmed waits for its turn.
 class WaitingChangesTest : public BrowserFixture {
@@ -234,6 +237,97 @@ TEST_F(WaitingChangesTest, ListsThatComeMeanwhileShowTheProgressToo)
     settle();
     EXPECT_EQ(topList()->toolbarItems().size(), 3);
     EXPECT_THAT(dimmed(), testing::IsEmpty());
+}
+
+/// Something happens between a tap and the question that it leads to, because the disk is slow.
+class SlowDiskTest : public BrowserFixture {
+protected:
+    void perform(DocumentListAction action, const Url& item)
+    {
+        browser->documentListControllerPerformActionURLOriginatingViewCompletion(
+            topList(), static_cast<int>(action), item, topList()->view(), [this] { ++completions; });
+    }
+    int completions = 0;
+};
+
+TEST_F(SlowDiskTest, NoTapLooksAtAnItem)
+{
+    const auto note = write("a.txt");
+    write("Folder/inner.txt");
+    struct Row {
+        const char* name;
+        std::function<void()> tap;
+    };
+    const Row rows[] = {
+        {"folder", [this] { topList()->listView()->activateRow(2); }},
+        {"document", [this] { topList()->listView()->activateRow(3); }},
+        {"info", [&] { perform(DocumentListAction::Info, note); }},
+        {"rename", [&] { perform(DocumentListAction::Rename, note); }},
+        {"move", [&] { perform(DocumentListAction::Move, note); }},
+        {"delete", [&] { perform(DocumentListAction::Delete, note); }},
+        {"select",
+            [&] {
+                browser->beginEditMode(nullptr);
+                topList()->setSelectedItems({note, url("Documents")});
+            }},
+        {"new folder", [this] { browser->promtForNewFolderAndCreate(nullptr); }},
+    };
+    // Lines for a person who looks for a fault name the types of folders, which are read.
+    platform::setLogLevel(platform::LogLevel::Info);
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        launch();
+        ASSERT_EQ(topList()->listView()->row(2).title, "Folder");
+        cloud->looksAtItems = 0;
+        row.tap();
+        EXPECT_EQ(cloud->looksAtItems, 0);
+        settle();
+    }
+}
+
+TEST_F(SlowDiskTest, WhatIsAskedLastCounts)
+{
+    const auto a = write("a.txt"), b = write("b.txt");
+    launch();
+    perform(DocumentListAction::Rename, a);
+    perform(DocumentListAction::Delete, b);
+    EXPECT_EQ(completions, 1) << "the first one is dropped";
+    settle();
+    ASSERT_NE(alert(), nullptr);
+    EXPECT_THAT(alert()->message(), testing::HasSubstr("b.txt"));
+    alert()->userCancelled();
+    settle();
+    EXPECT_EQ(completions, 2);
+    EXPECT_EQ(alert(), nullptr);
+}
+
+TEST_F(SlowDiskTest, AQuestionDoesNotFollowToAnotherScreen)
+{
+    const auto note = write("a.txt");
+    write("Folder/b.txt");
+    const std::function<void()> leaves[] = {
+        [this] { browser->warpToNewURLPreviewMode(url("Folder/b.txt"), PreviewModeQuick); },
+        [this] { browser->warpToFolderForURL(url("Folder/")); },
+        [this] {
+            cloud->token = std::nullopt;
+            drive.notifications->post(Notification::CloudIdentityDidChange);
+        },
+    };
+    for (const auto& leave : leaves) {
+        for (const auto action : {DocumentListAction::Rename, DocumentListAction::Delete,
+                 DocumentListAction::Move, DocumentListAction::Info}) {
+            cloud->token = platform::PropertyValue("account-1");
+            launch();
+            post(Notification::ApplicationDidBecomeActive);
+            completions = 0;
+            perform(action, note);
+            leave();
+            settle();
+            EXPECT_EQ(alert(), nullptr);
+            EXPECT_THAT(stack(), testing::Not(testing::Contains("i")));
+            EXPECT_EQ(completions, 1) << "the list is told in any case";
+        }
+    }
 }
 
 } // namespace

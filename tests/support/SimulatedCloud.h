@@ -23,10 +23,15 @@ public:
     std::optional<platform::PropertyValue> token = platform::PropertyValue("account-1");
     platform::Result<std::int64_t> quota = std::int64_t{1000};
     mutable int requests = 0;
+    int looksAtItems = 0; ///< how often an item's attributes were asked for
     std::function<void()> beforeAnswer; ///< called while a quota request is pending
 
     platform::CloudAccount& account() override { return *this; }
-    platform::PromisedItems& promisedItems() override { return _documents->promisedItems(); }
+    platform::PromisedItems& promisedItems() override
+    {
+        ++looksAtItems;
+        return _documents->promisedItems();
+    }
     platform::DocumentContainers& containers() override { return _documents->containers(); }
     platform::CloudItems& items() override { return _documents->items(); }
     platform::DocumentIdentifiers& documentIdentifiers() override
@@ -39,6 +44,7 @@ public:
     }
 
     std::optional<platform::PropertyValue> identityToken() const override { return token; }
+    std::optional<platform::PropertyValue> knownIdentityToken() const override { return token; }
     platform::Work makeQuotaFetchOperation(
         std::function<void(platform::Result<std::int64_t>)> completion) const override
     {

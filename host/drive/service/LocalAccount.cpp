@@ -10,18 +10,38 @@
 
 namespace host::drive {
 
+namespace {
+
+platform::PropertyValue tokenOf(const std::string& identity)
+{
+    platform::Data token;
+    for (const char c : identity)
+        token.push_back(static_cast<std::byte>(c));
+    return platform::PropertyValue(std::move(token));
+}
+
+} // namespace
+
 std::optional<platform::PropertyValue> LocalAccount::identityToken() const
 {
     static constexpr platform::Operation op{"-[LocalAccount identityToken]"};
     const auto record = AccountRecord::read(_layout);
     if (record.error)
         op.error("Cannot use the account in %@: %@", _layout.account(), reasonOf(*record.error));
-    if (!record)
-        return std::nullopt;
-    platform::Data token;
-    for (const char c : record->identity)
-        token.push_back(static_cast<std::byte>(c));
-    return platform::PropertyValue(std::move(token));
+    auto token = record ? std::optional(tokenOf(record->identity)) : std::nullopt;
+    const std::lock_guard lock(_mutex);
+    _known = token;
+    return token;
+}
+
+std::optional<platform::PropertyValue> LocalAccount::knownIdentityToken() const
+{
+    {
+        const std::lock_guard lock(_mutex);
+        if (_known)
+            return *_known;
+    }
+    return identityToken();
 }
 
 platform::Work LocalAccount::makeQuotaFetchOperation(
