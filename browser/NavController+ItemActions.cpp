@@ -20,6 +20,7 @@
 #include "prompts/NewFolderPrompt.h"
 #include "prompts/RenamePrompt.h"
 #include "prompts/UIUtils.h"
+#include "screens/DrivePlaces.h"
 #include "screens/list/DocumentListController.h"
 
 namespace tarrow {
@@ -261,12 +262,13 @@ void NavController::showMoveTargetForItemsInFolder(
 void NavController::askForTarget(
     const std::vector<Url>& items, const std::optional<Url>& folder, const Completion& completion)
 {
-    const auto look = [items, folder] {
+    const auto look = [items, folder, shown = MoveTargetPicker::foldersToLookUp(items)] {
         MoveFacts facts;
         facts.holdsSpecialFolder = MenuEnableChecks::isDesktopOrDocumentsInURLArray(items);
         facts.mayLeaveContainer = !facts.holdsSpecialFolder && trw_canCrossZoneMoveURLs(items);
         facts.hasOtherFolder =
             facts.mayLeaveContainer || !folder || MenuEnableChecks::containerHasSubfolders(*folder);
+        facts.places = screens::DrivePlaces::lookUp(shown);
         return facts;
     };
     lookThen(
@@ -292,8 +294,8 @@ void NavController::showMoveTarget(
         showNewFolderPromptDuringMoveItemsToMove(folder, items);
         return;
     }
-    const auto picker = MoveTargetPicker::initWithItemsScope(
-        items, facts.mayLeaveContainer ? MoveTargetScope::AllContainers : MoveTargetScope::Container);
+    const auto picker = MoveTargetPicker::initWithItemsScopePlaces(items,
+        facts.mayLeaveContainer ? MoveTargetScope::AllContainers : MoveTargetScope::Container, facts.places);
     picker->setDelegate(self());
     _moveAsked.emplace();
     picker->setPresentationStyle(kit::PresentationStyle::OverCurrentContext);

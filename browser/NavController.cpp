@@ -143,7 +143,22 @@ void NavController::didBecomeActiveNotification()
 {
     static constexpr Operation op{"-[NavController didBecomeActiveNotification:]"};
     op.info("Got HostDidActivateEvent (nav)");
-    handleAccountChanges();
+    // The account is read on another thread, because its file may be slow and a window is activated often.
+    auto& dispatch = services().dispatch();
+    const auto queue = dispatch.makeSerialQueue("TarrowDriveAppID.activation");
+    queue->async(
+        [queue, main = dispatch.mainQueue(), compare = weakly(this, &NavController::compareAccount)] {
+            main->async([compare, token = currentToken()] { compare(token); });
+        });
+}
+
+void NavController::compareAccount(const std::optional<PropertyValue>& token)
+{
+    static constexpr Operation op{"-[NavController handleAccountChanges]"};
+    if (storedToken() == token)
+        op.debug("Tarrow Token Matches");
+    else
+        handleAccountChanges();
 }
 
 void NavController::tarrowAccountAvailabilityChanged()

@@ -28,8 +28,9 @@ class Operation;
 class PropertyValue;
 } // namespace platform
 namespace screens {
+class DrivePlaces;
 class UpgradeFlow;
-}
+} // namespace screens
 namespace kit {
 class BarButtonItem;
 }
@@ -217,6 +218,7 @@ private:
     void setupUnavailableScreen();
     void observeAccount();
     std::optional<platform::PropertyValue> storedToken() const;
+    void compareAccount(const std::optional<platform::PropertyValue>& token);
     void fetchQuotaAfter(int seconds);
     void replaceItemManager(int mode);
     void dropItemManager();
@@ -244,6 +246,7 @@ private:
     /// What has to be known before items are moved.
     struct MoveFacts {
         bool holdsSpecialFolder = false, mayLeaveContainer = false, hasOtherFolder = true;
+        std::shared_ptr<const screens::DrivePlaces> places{};
     };
     void askForTarget(const std::vector<platform::Url>& items, const std::optional<platform::Url>& folder,
         const Completion& completion);

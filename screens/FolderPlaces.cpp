@@ -73,12 +73,17 @@ std::vector<Url> foldersDownTo(const Url& folder)
     const auto container = containers().containerForItem(folder);
     if (!root || !container || !*container || !(*container)->documentsURL)
         return {};
-    auto place = *(*container)->documentsURL;
-    if (!folder.isWithin(place))
+    return foldersBetween(*root, *(*container)->documentsURL, folder);
+}
+
+std::vector<Url> foldersBetween(const Url& root, const Url& documents, const Url& folder)
+{
+    if (!folder.isWithin(documents))
         return {};
-    std::vector<Url> folders{*root};
-    if (place != *root)
-        folders.push_back(place);
+    std::vector<Url> folders{root};
+    if (documents != root)
+        folders.push_back(documents);
+    auto place = documents;
     const auto names = folder.pathComponents();
     for (auto i = place.pathComponents().size(); i < names.size(); ++i) {
         place = place.appendingPathComponent(names[i], PathKind::Directory);

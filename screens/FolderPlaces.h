@@ -39,4 +39,8 @@ std::vector<FolderSnapshot::ExtraItem> extraItemsOf(const Url& folder);
 /// container nor in a library.
 std::vector<Url> foldersDownTo(const Url& folder);
 
+/// Answers the same for a known top level and a known documents folder of the folder's container, without a
+/// look at the disk.
+std::vector<Url> foldersBetween(const Url& root, const Url& documents, const Url& folder);
+
 } // namespace screens

@@ -3,7 +3,7 @@
 
 #include "screens/move/MoveTargetPicker.h"
 
-#include "screens/FolderPlaces.h"
+#include "screens/DrivePlaces.h"
 #include "screens/move/MoveTargetScreen.h"
 #include "screens/move/RecentMoveTargets.h"
 
@@ -15,21 +15,39 @@ namespace screens {
 std::shared_ptr<MoveTargetPicker> MoveTargetPicker::initWithItemsScope(
     std::vector<Url> items, MoveTargetScope scope)
 {
-    const auto picker = std::make_shared<MoveTargetPicker>(std::move(items), scope);
+    const auto places = DrivePlaces::lookUp(foldersToLookUp(items));
+    return initWithItemsScopePlaces(std::move(items), scope, places);
+}
+
+std::vector<Url> MoveTargetPicker::foldersToLookUp(const std::vector<Url>& items)
+{
+    auto folders = RecentMoveTargets::folders();
+    if (!items.empty())
+        folders.push_back(items.front().deletingLastPathComponent());
+    return folders;
+}
+
+std::shared_ptr<MoveTargetPicker> MoveTargetPicker::initWithItemsScopePlaces(
+    std::vector<Url> items, MoveTargetScope scope, std::shared_ptr<const DrivePlaces> places)
+{
+    const auto picker = std::make_shared<MoveTargetPicker>(std::move(items), scope, std::move(places));
+    const auto& root = picker->places().rootFolder();
     const auto start = picker->_itemsToMove.empty()
-        ? rootFolder()
+        ? root
         : std::optional(picker->_itemsToMove.front().deletingLastPathComponent());
     if (start)
         picker->show(*start);
     // The items' container may have gone. Without a screen the picker would have no Cancel button.
-    if (picker->viewControllers().empty() && rootFolder())
-        picker->show(*rootFolder());
+    if (picker->viewControllers().empty() && root)
+        picker->show(*root);
     return picker;
 }
 
-MoveTargetPicker::MoveTargetPicker(std::vector<Url> items, MoveTargetScope scope)
+MoveTargetPicker::MoveTargetPicker(
+    std::vector<Url> items, MoveTargetScope scope, std::shared_ptr<const DrivePlaces> places)
     : _itemsToMove(std::move(items))
     , _scope(scope)
+    , _places(std::move(places))
 {
     setPresentationStyle(kit::PresentationStyle::OverCurrentContext);
     setToolbarHidden(false);
@@ -47,10 +65,10 @@ std::shared_ptr<MoveTargetScreen> MoveTargetPicker::makeScreen(const Url& folder
 
 std::vector<Url> MoveTargetPicker::wayTo(const Url& folder) const
 {
-    auto way = foldersDownTo(folder);
+    auto way = _places->foldersDownTo(folder);
     if (_scope == MoveTargetScope::AllContainers || _itemsToMove.empty() || way.empty())
         return way;
-    const auto own = foldersDownTo(_itemsToMove.front().deletingLastPathComponent());
+    const auto own = _places->foldersDownTo(_itemsToMove.front().deletingLastPathComponent());
     const bool isInLibrary = own.size() > 1 && !own[1].isWithin(own[0]);
     if (!isInLibrary)
         return folder.isWithin(way.front()) ? way : std::vector<Url>();

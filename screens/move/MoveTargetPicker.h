@@ -12,6 +12,7 @@
 
 namespace screens {
 
+class DrivePlaces;
 class MoveTargetPicker;
 class MoveTargetScreen;
 
@@ -40,11 +41,19 @@ public:
     /// choice.
     static std::shared_ptr<MoveTargetPicker> initWithItemsScope(
         std::vector<Url> items, MoveTargetScope scope);
+    /// Makes the same from places that were looked up, and looks at nothing itself.
+    static std::shared_ptr<MoveTargetPicker> initWithItemsScopePlaces(
+        std::vector<Url> items, MoveTargetScope scope, std::shared_ptr<const DrivePlaces> places);
+    /// Answers the folders whose places a picker for these items needs.
+    static std::vector<Url> foldersToLookUp(const std::vector<Url>& items);
 
-    MoveTargetPicker(std::vector<Url> items, MoveTargetScope scope);
+    MoveTargetPicker(
+        std::vector<Url> items, MoveTargetScope scope, std::shared_ptr<const DrivePlaces> places);
 
     const std::vector<Url>& itemsToMove() const { return _itemsToMove; }
     MoveTargetScope scope() const { return _scope; }
+    const DrivePlaces& places() const { return *_places; }
+    const std::shared_ptr<const DrivePlaces>& sharedPlaces() const { return _places; }
     void setDelegate(std::weak_ptr<MoveTargetPickerDelegate> delegate) { _delegate = std::move(delegate); }
 
     /// Answers whether a folder lies within the picker's scope.
@@ -71,6 +80,7 @@ private:
 
     std::vector<Url> _itemsToMove;
     MoveTargetScope _scope;
+    std::shared_ptr<const DrivePlaces> _places;
     std::weak_ptr<MoveTargetPickerDelegate> _delegate;
     bool _hasEnded = false;
 };

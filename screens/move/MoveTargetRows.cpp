@@ -5,7 +5,7 @@
 
 #include "platform/Localization.h"
 #include "screens/DisplayName.h"
-#include "screens/FolderPlaces.h"
+#include "screens/DrivePlaces.h"
 
 #include <functional>
 #include <string>
@@ -26,9 +26,11 @@ kit::RowId idOf(std::string_view group, std::string_view name)
 
 } // namespace
 
-MoveTargetRows::MoveTargetRows(Libraries libraries, IsToBeMoved isToBeMoved)
+MoveTargetRows::MoveTargetRows(
+    Libraries libraries, IsToBeMoved isToBeMoved, std::shared_ptr<const DrivePlaces> places)
     : _libraries(libraries)
     , _isToBeMoved(std::move(isToBeMoved))
+    , _places(std::move(places))
 {
 }
 
@@ -108,10 +110,13 @@ kit::ListRow MoveTargetRows::recentRow(std::size_t index) const
     const auto& folder = _recents[index];
     kit::ListRow row;
     row.image = Image::named("document-open-recent-symbolic");
-    row.title = folderTitle(folder);
-    const auto way = foldersDownTo(folder);
+    const auto titleOf = [this](const Url& known) {
+        return _places->folderTitle(known).value_or(displayName(known.lastPathComponent()));
+    };
+    row.title = titleOf(folder);
+    const auto way = _places->foldersDownTo(folder);
     if (way.size() > 1)
-        row.detail = folderTitle(way[way.size() - 2]);
+        row.detail = titleOf(way[way.size() - 2]);
     row.accessory = kit::RowAccessory::Disclosure;
     return row;
 }

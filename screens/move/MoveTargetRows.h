@@ -14,6 +14,8 @@
 
 namespace screens {
 
+class DrivePlaces;
+
 /// The rows of a MoveTargetScreen: recent destinations under a heading of their own, then the folders of one
 /// folder. Main thread only.
 class MoveTargetRows : public kit::ListViewDataSource {
@@ -22,7 +24,7 @@ public:
     using IsToBeMoved = std::function<bool(const Url&)>;
     enum class Libraries { Shown, Hidden };
 
-    MoveTargetRows(Libraries libraries, IsToBeMoved isToBeMoved);
+    MoveTargetRows(Libraries libraries, IsToBeMoved isToBeMoved, std::shared_ptr<const DrivePlaces> places);
 
     void setSnapshot(std::shared_ptr<const FolderSnapshot> snapshot);
     void setRecents(std::vector<Url> recents) { _recents = std::move(recents); }
@@ -45,6 +47,7 @@ private:
 
     Libraries _libraries;
     IsToBeMoved _isToBeMoved;
+    std::shared_ptr<const DrivePlaces> _places;
     std::vector<Url> _recents;
     std::shared_ptr<const FolderSnapshot> _snapshot;
     std::vector<std::uint32_t> _folders; ///< indexes in the snapshot

@@ -12,6 +12,8 @@
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/Weakly.h"
+#include "screens/DisplayName.h"
+#include "screens/DrivePlaces.h"
 #include "screens/ErrorWords.h"
 #include "screens/FolderPlaces.h"
 #include "screens/PlaceholderView.h"
@@ -43,7 +45,22 @@ MoveTargetScreen::MoveTargetScreen(std::weak_ptr<MoveTargetPicker> picker, Url f
     , _folder(std::move(folder))
     , _queue(services().dispatch().makeOperationQueue("move destinations", QualityOfService::UserInitiated))
 {
-    setTitle(folderTitle(_folder));
+    const auto asking = _picker.lock();
+    const auto title = asking ? asking->places().folderTitle(_folder) : std::nullopt;
+    setTitle(title.value_or(displayName(_folder.lastPathComponent())));
+    _isTitleKnown = title.has_value();
+}
+
+/// Looks up the title of a folder that was entered from its row.
+void MoveTargetScreen::findTitle()
+{
+    const auto main = services().dispatch().mainQueue();
+    _queue->addOperation([weak = std::weak_ptr(self()), folder = _folder, main] {
+        main->async(weakly(weak, [title = folderTitle(folder)](MoveTargetScreen& found) {
+            found.setTitle(title);
+            found._listView->setAccessibility({.label = title, .hint = {}});
+        }));
+    });
 }
 
 MoveTargetScreen::~MoveTargetScreen() = default;
@@ -69,17 +86,21 @@ void MoveTargetScreen::viewDidLoad()
 {
     makeBars();
     const auto picker = _picker.lock();
-    const bool showsLibraries = picker && picker->scope() == MoveTargetScope::AllContainers;
+    if (!picker)
+        return;
+    const bool showsLibraries = picker->scope() == MoveTargetScope::AllContainers;
     _rows = std::make_shared<MoveTargetRows>(
         showsLibraries ? MoveTargetRows::Libraries::Shown : MoveTargetRows::Libraries::Hidden,
-        weaklyOr(false, _picker, &MoveTargetPicker::isToBeMoved));
+        weaklyOr(false, _picker, &MoveTargetPicker::isToBeMoved), picker->sharedPlaces());
     _listView->setDataSource(_rows);
     _listView->setListDelegate(
         std::shared_ptr<kit::ListViewDelegate>(self(), static_cast<kit::ListViewDelegate*>(this)));
     _listing = services().folderLister().list(_folder,
-        showsLibraries ? extraItemsOf(_folder) : std::vector<FolderSnapshot::ExtraItem>(),
+        showsLibraries ? picker->places().extraItemsOf(_folder) : std::vector<FolderSnapshot::ExtraItem>(),
         FolderGrouping::FoldersFirst, weakly(this, &MoveTargetScreen::snapshotArrived));
     findRecents();
+    if (!_isTitleKnown)
+        findTitle();
 }
 
 void MoveTargetScreen::makeBars()

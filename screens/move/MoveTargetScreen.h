@@ -53,12 +53,14 @@ private:
     void snapshotArrived(const std::shared_ptr<const FolderSnapshot>& snapshot);
     void showState(const std::optional<Error>& error);
     void findRecents();
+    void findTitle();
     void showRecents(std::vector<Url> recents);
     void makeFolder(const std::string& name);
     void folderWasMade(const Url& made, const std::optional<Error>& error);
 
     std::weak_ptr<MoveTargetPicker> _picker;
     Url _folder;
+    bool _isTitleKnown = false;
     std::shared_ptr<kit::ListView> _listView;
     std::shared_ptr<PlaceholderView> _placeholder;
     std::shared_ptr<kit::BarButtonItem> _moveButton;
