@@ -107,6 +107,16 @@ int save(const Url& url, const Url& from)
     return report(files.replaceContent(url.path(), *before, *content->bytes).error);
 }
 
+/// Gives an item tags in place of its own.
+int tag(const Url& url, const std::vector<Url>& tags)
+{
+    std::vector<std::string> names;
+    for (const auto& each : tags)
+        names.push_back(each.lastPathComponent());
+    const auto before = FileUtils::setTags(url, names);
+    return report(before.error);
+}
+
 /// Prints the items that a user sees below a folder, sorted by path: the kind, a tab, the path. A document
 /// beside its own promise is listed once.
 int list(const Url& folder)
@@ -145,6 +155,8 @@ int run(std::string_view command, const std::vector<Url>& urls, host::system::GL
         return report(FileUtils::moveTo(urls[0], urls[1]));
     if (command == "save" && urls.size() == 2)
         return save(urls[0], urls[1]);
+    if (command == "tag" && !urls.empty())
+        return tag(urls[0], {urls.begin() + 1, urls.end()});
     if (command == "fetch" && urls.size() == 1)
         return fetch(urls[0], dispatch);
     if (command == "list" && urls.size() == 1)
@@ -178,7 +190,7 @@ int main(int argc, char** argv)
                                 : 2;
     if (status == 2)
         std::fputs("usage: tarrow-files list [PATH] | mkdir|remove|evict|fetch|docid PATH | move FROM TO | "
-                   "save PATH FROM | resolve ID\n",
+                   "save PATH FROM | tag PATH [TAG...] | resolve ID\n",
             stderr);
     platform::installServices({});
     return status;

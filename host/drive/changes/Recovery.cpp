@@ -49,6 +49,25 @@ std::string documentPath(const std::string& path)
     return PromiseRecord::itemPathFor(path).value_or(path);
 }
 
+/// Answers the promise of this very name in an open folder.
+std::optional<PromiseRecord> promiseAt(const DriveEntry& entry)
+{
+    const auto text = system::readWholeFile(entry.folder, entry.name, PromiseRecord::maximumFileSize);
+    return text ? PromiseRecord::parse(*text) : std::nullopt;
+}
+
+/// Answers whether a held promise and the one in its place say the same but for the tags, which were being
+/// changed.
+bool differsInTagsAlone(const DriveEntry& held, const DriveEntry& origin)
+{
+    auto before = PromiseRecord::itemPathFor(origin.path) ? promiseAt(held) : std::nullopt;
+    const auto now = before ? promiseAt(origin) : std::nullopt;
+    if (!now)
+        return false;
+    before->tags = now->tags;
+    return before == now;
+}
+
 } // namespace
 
 void Recovery::run()
@@ -135,6 +154,8 @@ bool Recovery::discard(const DriveEntry& entry, bool contentsToo)
 bool Recovery::putBack(const DriveEntry& held, const std::string& item)
 {
     const auto origin = DriveEntry::open(_layout, item);
+    if (origin && differsInTagsAlone(held, *origin))
+        return discard(held, false);
     const auto failure = origin ? renameEntry(held.folder, held.name, origin->folder, origin->name)
                                 : SystemError(ENOENT, item);
     if (!failure)

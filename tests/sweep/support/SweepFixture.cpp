@@ -21,6 +21,9 @@ namespace fs = std::filesystem;
 
 using host::drive::PromiseRecord;
 
+/// What stands in the picture of a drive for a promise's tag.
+constexpr const char* tagged = "tagged";
+
 void PrintTo(const Operation& operation, std::ostream* stream)
 {
     *stream << operation.name;
@@ -38,7 +41,7 @@ std::vector<Operation> operations()
         {"moveFolderAcross", {"move", "folder", "target/new"}, FileSystems::Several},
         {"movePromiseAcross", {"move", "inner/p.txt", "target/new.txt"}, FileSystems::Several},
         {"save", {"save", "inner/file.txt", "folder/a.txt"}}, {"evict", {"evict", "inner/file.txt"}},
-        {"fetch", {"fetch", "inner/p.txt"}}};
+        {"fetch", {"fetch", "inner/p.txt"}}, {"tagPromise", {"tag", "inner/p.txt", "Red", "Blue"}}};
 }
 
 void SweepFixture::makeDrive() const
@@ -107,14 +110,17 @@ Drive SweepFixture::seen() const
     for (auto each = fs::recursive_directory_iterator(_layout.documents());
          each != fs::recursive_directory_iterator(); ++each) {
         const auto path = each->path().string();
-        if (const auto item = PromiseRecord::itemPathFor(path))
+        if (const auto item = PromiseRecord::itemPathFor(path)) {
             drive["promise of " + *item] = behind(path);
-        else if (each->path().filename().string().starts_with(".trw"))
+            for (const auto& tag : PromiseRecord::parse(read(path)).value_or(PromiseRecord()).tags)
+                drive["tag " + tag + " of " + *item] = tagged;
+        } else if (each->path().filename().string().starts_with(".trw")) {
             each.disable_recursion_pending();
-        else
+        } else {
             drive[path] = each->is_symlink() ? "link to " + fs::read_symlink(path).string()
                 : each->is_directory()       ? "folder"
                                              : read(path);
+        }
     }
     return drive;
 }
@@ -163,7 +169,7 @@ bool SweepFixture::isAllThere(const Drive& drive) const
             contents.push_back(read(entry.path().string()));
     }
     return std::ranges::all_of(drive, [&](const auto& item) {
-        return item.second == "folder" || item.second.starts_with("link to ")
+        return item.second == "folder" || item.second == tagged || item.second.starts_with("link to ")
             || std::ranges::find(contents, item.second) != contents.end();
     });
 }
@@ -171,7 +177,7 @@ bool SweepFixture::isAllThere(const Drive& drive) const
 bool SweepFixture::isNothingHalf(const Drive& now, const Drive& before)
 {
     return std::ranges::all_of(now, [&](const auto& item) {
-        return item.second == "folder" || item.second == "nothing"
+        return item.second == "folder" || item.second == "nothing" || item.second == tagged
             || std::ranges::any_of(before, [&](const auto& old) { return old.second == item.second; });
     });
 }
