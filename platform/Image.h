@@ -23,16 +23,21 @@ public:
     static Image fromPixels(int pixelWidth, int pixelHeight, double scale, std::vector<std::uint32_t> pixels);
 
     /// Makes an image of an icon's name, by the freedesktop icon naming conventions, such as
-    /// "folder-symbolic". Whether the theme has it shows only where it is drawn.
-    static Image named(std::string iconName);
+    /// "folder-symbolic". Whether the theme has it shows only where it is drawn. An icon may have a side in
+    /// points of its own; without one its size is given where it is shown.
+    static Image named(std::string iconName, double pointSize = 0);
 
     /// Whether the image is an icon's name.
     bool isNamed() const { return !_data->iconName.empty(); }
     /// The icon's name; empty for an image of pixels.
     const std::string& iconName() const { return _data->iconName; }
 
-    /// The size in points; zero for a named icon, whose size is given where it is shown.
-    Size size() const { return {_data->pixelWidth / _data->scale, _data->pixelHeight / _data->scale}; }
+    /// The size in points; zero for a named icon without a size of its own.
+    Size size() const
+    {
+        return isNamed() ? Size{_data->pointSize, _data->pointSize}
+                         : Size{_data->pixelWidth / _data->scale, _data->pixelHeight / _data->scale};
+    }
     /// The size in pixels; zero for a named icon.
     int pixelWidth() const { return _data->pixelWidth; }
     int pixelHeight() const { return _data->pixelHeight; }
@@ -41,7 +46,8 @@ public:
     /// The pixels as fromPixels() took them; empty for a named icon.
     const std::vector<std::uint32_t>& pixels() const { return _data->pixels; }
 
-    /// Two images are equal when they share their pixels or name the same icon; pixels are never compared.
+    /// Two images are equal when they share their pixels or name the same icon in the same size; pixels are
+    /// never compared.
     bool operator==(const Image& other) const;
 
 private:
@@ -50,6 +56,7 @@ private:
         double scale = 1;
         std::vector<std::uint32_t> pixels;
         std::string iconName;
+        double pointSize = 0; ///< of a named icon
     };
     explicit Image(std::shared_ptr<const Data> data)
         : _data(std::move(data))

@@ -44,7 +44,8 @@ void ImageView::setMagnification(ImageFilter filter)
 
 Size ImageView::intrinsicContentSize(double) const
 {
-    return _image && !_image->isNamed() ? _image->size() : Size{noIntrinsicMetric, noIntrinsicMetric};
+    const bool hasSize = _image && (!_image->isNamed() || _image->size().width > 0);
+    return hasSize ? _image->size() : Size{noIntrinsicMetric, noIntrinsicMetric};
 }
 
 } // namespace kit

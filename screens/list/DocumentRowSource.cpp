@@ -11,6 +11,7 @@
 #include "platform/Weakly.h"
 #include "screens/DetailText.h"
 #include "screens/DisplayName.h"
+#include "screens/DocumentIcon.h"
 #include "screens/list/RowThumbnail.h"
 
 #include <algorithm>
@@ -180,10 +181,7 @@ const std::string& DocumentRowSource::documentIcon(std::string_view name) const
     const auto known = _iconsByExtension.find(extension);
     if (known != _iconsByExtension.end())
         return known->second;
-    const auto& types = services().typeRegistry();
-    const auto type = types.typeForExtension(extension);
-    return _iconsByExtension.emplace(extension, type ? types.iconName(*type) : plainDocumentIcon)
-        .first->second;
+    return _iconsByExtension.emplace(extension, documentIconName({}, name)).first->second;
 }
 
 const std::string& DocumentRowSource::documentKind(std::string_view name) const

@@ -3,8 +3,10 @@
 
 #include "tests/screens/support/ScreensFixture.h"
 
+#include "kit/views/ImageView.h"
 #include "kit/views/View.h"
 #include "platform/Localization.h"
+#include "screens/DocumentIcon.h"
 #include "screens/DocumentInteractionSheet.h"
 #include "screens/PlaceholderView.h"
 #include "screens/UnavailableScreen.h"
@@ -50,6 +52,24 @@ protected:
     std::shared_ptr<DocumentInteractionSheet> sheet;
     std::shared_ptr<CountingSheetDelegate> told = std::make_shared<CountingSheetDelegate>();
 };
+
+TEST_F(Screens, ShowTheIconOfADocumentInItsSize)
+{
+    const struct {
+        const char *type, *name, *icon;
+    } rows[] = {{"public.pdf", "a.txt", "x-office-document"}, {"", "a.png", "image-x-generic"},
+        {"public.data", "a.PNG", "image-x-generic"}, {"", "a", "text-x-generic"},
+        {"public.directory", "a.png", "folder"}};
+    for (const auto& row : rows) {
+        const auto icon = documentIcon(row.type, row.name, DocumentIconFormat::Large);
+        EXPECT_EQ(icon.iconName(), row.icon) << row.type << ' ' << row.name;
+        EXPECT_EQ(icon.size(), (Size{64, 64}));
+        EXPECT_EQ(kit::ImageView(icon).intrinsicContentSize(), (Size{64, 64}));
+        EXPECT_NE(icon, Image::named(row.icon)) << "an icon without a size is given one where it is shown";
+    }
+    EXPECT_EQ(kit::ImageView(Image::named("folder")).intrinsicContentSize(),
+        (Size{kit::ImageView::noIntrinsicMetric, kit::ImageView::noIntrinsicMetric}));
+}
 
 TEST_F(Screens, OfferWhatFitsTheItem)
 {

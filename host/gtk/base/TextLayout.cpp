@@ -38,7 +38,7 @@ void insertColor(PangoAttrList* list, const GdkRGBA& color, std::size_t start, s
 
 platform::Size attachmentSize(const Image& image, const Theme& theme, const Font& font)
 {
-    if (!image.isNamed())
+    if (!image.isNamed() || image.size().width > 0)
         return image.size();
     const auto description = theme.describe(font);
     const double side = static_cast<double>(pango_font_description_get_size(description.get())) / PANGO_SCALE;
