@@ -110,12 +110,13 @@ ServiceSet systemServices(const std::string& executable, const UserLocale& local
 }
 
 /// Adds the services that work on the drive's folder, and answers the drive's layout.
-DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale)
+DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale,
+    const std::shared_ptr<const platform::ThumbnailMaker>& thumbnailMaker)
 {
     const host::drive::DriveDependencies dependencies{
         set.dispatch, set.notificationCenter, set.typeRegistry, set.localization, set.linkOpener};
-    const auto cloud = LocalCloudDocumentService::create(
-        DriveLayout::fromEnvironment(), dependencies, {.languages = locale.languageList()});
+    const auto cloud = LocalCloudDocumentService::create(DriveLayout::fromEnvironment(), dependencies,
+        {.languages = locale.languageList(), .thumbnailMaker = thumbnailMaker});
     set.cloudDocumentService = cloud;
     set.activityHandOver = LocalActivityHandOver::create(cloud->layout(), dependencies, cloud);
     set.fileChanges = cloud->fileChanges();
@@ -148,7 +149,7 @@ int main(int argc, char** argv)
     const auto locale = UserLocale::fromEnvironment();
     const auto previews = host::gtk::PreviewModule::inFile(previewModule(executable));
     auto set = systemServices(executable, locale, previews);
-    const auto layout = addDriveServices(set, locale);
+    const auto layout = addDriveServices(set, locale, previews);
     // The queues are destroyed last, because other services may still post work to them while they are
     // destroyed.
     const auto dispatch = set.dispatch;

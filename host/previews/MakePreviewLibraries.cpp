@@ -3,6 +3,7 @@
 
 #include "host/previews/MakePreviewLibraries.h"
 
+#include "host/previews/DocumentThumbnails.h"
 #include "host/previews/MediaPeer.h"
 #include "host/previews/PdfPrinting.h"
 #include "host/previews/PopplerDocuments.h"
@@ -18,6 +19,7 @@ class Libraries : public gtk::PreviewLibraries {
 public:
     const platform::PagedDocumentOpener& pagedDocuments() const override { return _documents; }
     const platform::TextDecoder& textDecoder() const override { return _decoder; }
+    const platform::ThumbnailMaker& thumbnails() const override { return _thumbnails; }
     platform::Result<std::shared_ptr<gtk::PrintablePages>> readPrintablePdf(
         const std::string& path) const override
     {
@@ -37,6 +39,7 @@ public:
 private:
     PopplerDocuments _documents;
     UchardetDecoder _decoder;
+    DocumentThumbnails _thumbnails;
 };
 
 } // namespace

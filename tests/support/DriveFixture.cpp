@@ -6,6 +6,7 @@
 #include "host/drive/records/AccountRecord.h"
 #include "host/drive/records/ItemFacts.h"
 #include "host/drive/records/LinkRecords.h"
+#include "host/previews/DocumentThumbnails.h"
 #include "host/previews/PopplerDocuments.h"
 #include "host/previews/UchardetDecoder.h"
 #include "host/system/coordination/LocalFileCoordinator.h"
@@ -100,8 +101,8 @@ DriveFixture::DriveFixture()
     set.userDefaults = std::make_shared<host::system::JsonUserDefaults>(layout.defaults(), *dispatch);
     host::drive::DriveDependencies dependencies{
         dispatch, notifications, set.typeRegistry, set.localization, set.linkOpener};
-    cloud = host::drive::LocalCloudDocumentService::create(
-        layout, dependencies, {{"en"}, _folder.at("thumbnails")});
+    cloud = host::drive::LocalCloudDocumentService::create(layout, dependencies,
+        {{"en"}, _folder.at("thumbnails"), std::make_shared<host::previews::DocumentThumbnails>()});
     set.cloudDocumentService = cloud;
     handOver = host::drive::LocalActivityHandOver::create(cloud->layout(), dependencies, cloud);
     set.activityHandOver = handOver;

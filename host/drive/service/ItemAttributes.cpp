@@ -155,10 +155,19 @@ ItemAttributes::Kind ItemAttributes::kind(const Url& url, const ItemFacts& facts
     return {named.empty() ? std::string(types::package) : std::move(named), true, true};
 }
 
-bool ItemAttributes::isPicture(const Url& url, const ItemFacts& facts) const
+platform::ThumbnailContent ItemAttributes::thumbnailContent(const Url& url, const ItemFacts& facts) const
 {
-    return facts.presence == ItemFacts::Presence::Here && isRegularFile(facts)
-        && _types->conformsTo(kind(url, facts).type, platform::typeIdentifier::image);
+    using platform::ThumbnailContent;
+    namespace types = platform::typeIdentifier;
+    if (facts.presence != ItemFacts::Presence::Here || !isRegularFile(facts))
+        return ThumbnailContent::None;
+    const auto type = kind(url, facts).type;
+    const std::pair<std::string_view, ThumbnailContent> contents[] = {
+        {types::image, ThumbnailContent::Picture}, {types::pdf, ThumbnailContent::Pages},
+        {types::movie, ThumbnailContent::Film}};
+    const auto found = std::ranges::find_if(
+        contents, [&](const auto& content) { return _types->conformsTo(type, content.first); });
+    return found == std::end(contents) ? ThumbnailContent::None : found->second;
 }
 
 std::optional<std::string> ItemAttributes::description(const std::string& type) const

@@ -7,6 +7,7 @@
 #include "host/system/files/DriveNames.h"
 #include "platform/DocumentContainers.h"
 #include "platform/Localization.h"
+#include "platform/ThumbnailMaker.h"
 #include "platform/TypeRegistry.h"
 
 #include <memory>
@@ -30,8 +31,9 @@ public:
     void fill(platform::AttributeMap& map, const platform::Url& url, const ItemFacts& facts,
         platform::AttributeKeys keys) const;
 
-    /// Answers whether the item is a downloaded picture, judged by its name.
-    bool isPicture(const platform::Url& url, const ItemFacts& facts) const;
+    /// Answers what a thumbnail of the item can be made of, judged by its name; nothing for an item that is
+    /// not downloaded.
+    platform::ThumbnailContent thumbnailContent(const platform::Url& url, const ItemFacts& facts) const;
 
 private:
     struct Kind {

@@ -27,7 +27,7 @@ LocalCloudDocumentService::LocalCloudDocumentService(
     , _promisedItems(layout,
           ItemAttributes(dependencies.typeRegistry, _containers, dependencies.localization,
               layout.defaultContainerURL()),
-          std::make_shared<ThumbnailCache>(settings.thumbnailFolder), _identifiers)
+          std::make_shared<ThumbnailCache>(settings.thumbnailFolder, settings.thumbnailMaker), _identifiers)
     , _items(layout, _identifiers, _store, dependencies.dispatch, dependencies.notificationCenter)
     , _storageOffers(LocalStorageOfferManager::create(layout, dependencies))
     , _keyValueStore(LocalKeyValueStore::create(layout, dependencies))

@@ -24,6 +24,7 @@ public:
     struct Settings {
         std::vector<std::string> languages; ///< of the containers' names, the preferred language first
         std::string thumbnailFolder = ThumbnailCache::sharedFolder();
+        std::shared_ptr<const platform::ThumbnailMaker> thumbnailMaker; ///< null: only pictures get one
     };
 
     /// Creates the drive's home folder when it is missing, and begins to watch the account.

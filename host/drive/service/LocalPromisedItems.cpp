@@ -96,9 +96,8 @@ void LocalPromisedItems::fill(
     const auto modified = facts.modified();
     if (!modified)
         return;
-    const auto ifMissing = _attributes.isPicture(url, facts) ? ThumbnailCache::IfMissing::MakeFromPicture
-                                                             : ThumbnailCache::IfMissing::Nothing;
-    if (auto thumbnails = _thumbnails->thumbnails(url, *modified, ifMissing); !thumbnails.empty())
+    const auto content = _attributes.thumbnailContent(url, facts);
+    if (auto thumbnails = _thumbnails->thumbnails(url, *modified, content); !thumbnails.empty())
         map.set(AttributeKey::ThumbnailMap, std::move(thumbnails));
 }
 

@@ -3,117 +3,159 @@
 
 #include "host/drive/service/ThumbnailCache.h"
 
-#include "host/system/desktop/PixbufImage.h"
-#include "platform/Log.h"
+#include "host/drive/service/ThumbnailFiles.h"
+#include "platform/ImageLoader.h"
+#include "platform/PagedDocument.h"
 
-#include <gdk-pixbuf/gdk-pixbuf.h>
 #include <unistd.h>
 
-#include <cstdio>
-#include <filesystem>
+#include <algorithm>
+#include <cerrno>
+#include <utility>
 
 namespace host::drive {
 
 namespace {
 
+using platform::Error;
+using platform::Image;
+using platform::Result;
+using platform::ThumbnailContent;
+using platform::ThumbnailMap;
 using system::Pixbuf;
 
-struct FreeText {
-    void operator()(char* text) const { g_free(text); }
-};
-using Text = std::unique_ptr<char, FreeText>;
-
-std::string uriOf(const std::string& path)
+std::optional<Image> imageOf(const Pixbuf& picture)
 {
-    const Text uri(g_filename_to_uri(path.c_str(), nullptr, nullptr));
-    return uri ? uri.get() : "";
+    return picture ? std::optional(system::imageOf(picture.get(), 1)) : std::nullopt;
 }
 
-std::string seconds(platform::Date date)
+Error imageError(platform::ImageErrorCode code)
 {
-    return std::to_string(date.nanoseconds / 1'000'000'000);
+    return {platform::errorDomain::image, static_cast<int>(code)};
 }
 
-std::string entryPath(const std::string& folder, const std::string& uri)
+/// Answers whether the error will come again as long as the document does not change.
+bool isLasting(const Error& error)
 {
-    const Text name(g_compute_checksum_for_string(G_CHECKSUM_MD5, uri.c_str(), -1));
-    return folder + "/xx-large/" + name.get() + ".png";
+    return error.domain() == platform::errorDomain::image || error.domain() == platform::errorDomain::pages;
 }
 
-// Answers the entry for this version of the file, or null when it is missing or was made from another
-// version.
-Pixbuf readEntry(const std::string& folder, const std::string& uri, platform::Date modified)
+Result<Image> scaledPicture(const std::string& path)
 {
-    const auto path = entryPath(folder, uri);
     if (::access(path.c_str(), R_OK) != 0)
-        return nullptr;
-    Pixbuf entry(gdk_pixbuf_new_from_file(path.c_str(), nullptr));
-    const char* time = entry ? gdk_pixbuf_get_option(entry.get(), "tEXt::Thumb::MTime") : nullptr;
-    const char* name = entry ? gdk_pixbuf_get_option(entry.get(), "tEXt::Thumb::URI") : nullptr;
-    return time && name && seconds(modified) == time && uri == name ? std::move(entry) : nullptr;
-}
-
-Pixbuf scaledPicture(const std::string& path)
-{
+        return Error(platform::errorDomain::system, errno);
     int width = 0, height = 0;
-    if (!gdk_pixbuf_get_file_info(path.c_str(), &width, &height) || width <= 0 || height <= 0
-        || std::int64_t{width} * height > ThumbnailCache::mostPixels)
-        return nullptr;
+    if (!gdk_pixbuf_get_file_info(path.c_str(), &width, &height) || width <= 0 || height <= 0)
+        return imageError(platform::ImageErrorCode::Damaged);
+    if (std::int64_t{width} * height > ThumbnailCache::mostPixels)
+        return imageError(platform::ImageErrorCode::TooLarge);
     const int side = std::min(ThumbnailCache::pixelSize, std::max(width, height));
     const Pixbuf picture(gdk_pixbuf_new_from_file_at_scale(path.c_str(), side, side, TRUE, nullptr));
-    return picture ? Pixbuf(gdk_pixbuf_apply_embedded_orientation(picture.get())) : nullptr;
-}
-
-// Writes the entry under a temporary name first, so that other programs never read half of it.
-void writeEntry(const std::string& folder, GdkPixbuf* pixbuf, const std::string& uri, platform::Date modified)
-{
-    static constexpr platform::Operation op{"-[ThumbnailCache writeEntry:]"};
-    std::error_code error;
-    std::filesystem::create_directories(folder + "/xx-large", error);
-    std::filesystem::permissions(folder + "/xx-large", std::filesystem::perms::owner_all, error);
-    auto temporary = folder + "/xx-large/.tarrow-XXXXXX";
-    const int file = ::mkstemp(temporary.data()); // readable by its owner only, as the cache's rules demand
-    if (file < 0)
-        return;
-    ::close(file);
-    const auto time = seconds(modified);
-    const bool written = gdk_pixbuf_save(pixbuf, temporary.c_str(), "png", nullptr, "tEXt::Thumb::URI",
-        uri.c_str(), "tEXt::Thumb::MTime", time.c_str(), "tEXt::Software", "Tarrow Drive", "compression", "3",
-        nullptr);
-    if (!written || std::rename(temporary.c_str(), entryPath(folder, uri).c_str()) != 0) {
-        op.warning("Cannot write a thumbnail below %@", folder);
-        ::unlink(temporary.c_str());
-    }
-}
-
-Pixbuf make(const std::string& folder, const std::string& path, platform::Date modified)
-{
-    auto picture = scaledPicture(path);
-    if (picture)
-        writeEntry(folder, picture.get(), uriOf(path), modified);
-    return picture;
+    if (!picture)
+        return imageError(platform::ImageErrorCode::Damaged);
+    return *imageOf(Pixbuf(gdk_pixbuf_apply_embedded_orientation(picture.get())));
 }
 
 } // namespace
 
-ThumbnailCache::ThumbnailCache(std::string folder)
-    : _folder(std::move(folder))
+/// The turn of one thread at a document's thumbnail; others wait for its end.
+class ThumbnailCache::Turn {
+public:
+    Turn(ThumbnailCache& cache, const std::string& uri)
+        : _cache(cache)
+        , _uri(uri)
+    {
+        std::unique_lock lock(_cache._mutex);
+        _cache._ended.wait(lock, [&] { return !_cache._beingMade.contains(_uri); });
+        _cache._beingMade.insert(_uri);
+    }
+    ~Turn()
+    {
+        {
+            const std::lock_guard lock(_cache._mutex);
+            _cache._beingMade.erase(_uri);
+        }
+        _cache._ended.notify_all();
+    }
+    Turn(const Turn&) = delete;
+    Turn& operator=(const Turn&) = delete;
+
+private:
+    ThumbnailCache& _cache;
+    const std::string& _uri;
+};
+
+ThumbnailCache::ThumbnailCache(std::string folder, std::shared_ptr<const platform::ThumbnailMaker> maker)
+    : _files(std::make_unique<const ThumbnailFiles>(std::move(folder)))
+    , _maker(std::move(maker))
 {
 }
+
+ThumbnailCache::~ThumbnailCache() = default;
 
 std::string ThumbnailCache::sharedFolder()
 {
     return std::string(g_get_user_cache_dir()) + "/thumbnails";
 }
 
-platform::ThumbnailMap ThumbnailCache::thumbnails(
-    const platform::Url& url, platform::Date modified, IfMissing ifMissing) const
+ThumbnailMap ThumbnailCache::thumbnails(
+    const platform::Url& url, platform::Date modified, ThumbnailContent content)
 {
-    auto picture = readEntry(_folder, uriOf(url.path()), modified);
-    if (!picture && ifMissing == IfMissing::MakeFromPicture)
-        picture = make(_folder, url.path(), modified);
-    return picture ? platform::ThumbnailMap{{pixelSize, system::imageOf(picture.get(), 1)}}
-                   : platform::ThumbnailMap{};
+    const ThumbnailVersion version(url.path(), modified);
+    auto image = imageOf(_files->read(version, pixelSize));
+    if (!image && content != ThumbnailContent::None)
+        image = made(url.path(), version, content);
+    if (image)
+        return {{pixelSize, std::move(*image)}};
+    for (const int side : {512, 256, 128}) {
+        if (auto smaller = imageOf(_files->read(version, side)))
+            return {{side, std::move(*smaller)}};
+    }
+    return {};
+}
+
+std::optional<Image> ThumbnailCache::made(
+    const std::string& path, const ThumbnailVersion& version, ThumbnailContent content)
+{
+    const Turn turn(*this, version.uri);
+    if (auto entry = imageOf(_files->read(version, pixelSize)))
+        return entry; // another thread made it before this turn
+    const int attempts = _files->attempts(version);
+    if (attempts >= mostAttempts || isRefused(version))
+        return std::nullopt;
+    _files->noteAttempts(version, attempts + 1);
+    auto image = make(path, content);
+    if (!image) {
+        noteFailure(version, *image.error);
+        return std::nullopt;
+    }
+    _files->write(version, system::pixbufOf(*image).get());
+    _files->noteAttempts(version, 0);
+    return std::move(image.value);
+}
+
+Result<Image> ThumbnailCache::make(const std::string& path, ThumbnailContent content) const
+{
+    if (content == ThumbnailContent::Picture)
+        return scaledPicture(path);
+    if (!_maker)
+        return Error(platform::errorDomain::system, ENOSYS);
+    return _maker->makeThumbnail(path, content, pixelSize);
+}
+
+void ThumbnailCache::noteFailure(const ThumbnailVersion& version, const Error& error)
+{
+    _files->noteAttempts(version, isLasting(error) ? mostAttempts : 0);
+    if (isLasting(error))
+        return;
+    const std::lock_guard lock(_mutex);
+    _refused.insert(version.uri + ' ' + version.time);
+}
+
+bool ThumbnailCache::isRefused(const ThumbnailVersion& version) const
+{
+    const std::lock_guard lock(_mutex);
+    return _refused.contains(version.uri + ' ' + version.time);
 }
 
 } // namespace host::drive

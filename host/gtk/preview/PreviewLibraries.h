@@ -5,6 +5,7 @@
 
 #include "platform/PagedDocument.h"
 #include "platform/TextDecoder.h"
+#include "platform/ThumbnailMaker.h"
 
 #include <memory>
 #include <string>
@@ -29,6 +30,7 @@ public:
     /// May be called on any thread.
     virtual const platform::PagedDocumentOpener& pagedDocuments() const = 0;
     virtual const platform::TextDecoder& textDecoder() const = 0;
+    virtual const platform::ThumbnailMaker& thumbnails() const = 0;
     /// Reads a PDF document to be printed. It may take long; any thread. The error says in a sentence why the
     /// document cannot be printed.
     virtual platform::Result<std::shared_ptr<PrintablePages>> readPrintablePdf(

@@ -115,6 +115,13 @@ std::string PreviewModule::decode(
                      : host::system::displayableText(bytes);
 }
 
+platform::Result<platform::Image> PreviewModule::makeThumbnail(
+    const std::string& path, platform::ThumbnailContent content, int pixelSize) const
+{
+    const auto libraries = load();
+    return libraries ? libraries->thumbnails().makeThumbnail(path, content, pixelSize) : missingError();
+}
+
 std::string PreviewModule::missingWords()
 {
     return system::translated("The part of the program that shows such documents is missing.");

@@ -27,6 +27,7 @@ namespace host::gtk {
 /// that, so that there is one copy of every class and of all state.
 class PreviewModule : public platform::PagedDocumentOpener,
                       public platform::TextDecoder,
+                      public platform::ThumbnailMaker,
                       public std::enable_shared_from_this<PreviewModule> {
 public:
     using Libraries = std::shared_ptr<const PreviewLibraries>;
@@ -58,6 +59,11 @@ public:
     /// characters.
     std::string decode(
         std::string_view bytes, const std::string& encoding, platform::TextEnd end) const override;
+
+    /// Loads the libraries first. The error is missingError() when the module is missing, else one of the
+    /// module's maker.
+    platform::Result<platform::Image> makeThumbnail(
+        const std::string& path, platform::ThumbnailContent content, int pixelSize) const override;
 
     /// The sentence for the screen when the libraries are missing, and the error with that sentence.
     static std::string missingWords();

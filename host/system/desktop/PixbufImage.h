@@ -21,4 +21,8 @@ using Pixbuf = std::unique_ptr<GdkPixbuf, UnrefObject>;
 /// Answers a copy of a picture's pixels as an image of this scale (pixels per point). Any thread.
 platform::Image imageOf(const GdkPixbuf* pixbuf, double scale);
 
+/// Answers a copy of an image's pixels as a picture that a library can write; null for an image without any.
+/// Any thread.
+Pixbuf pixbufOf(const platform::Image& image);
+
 } // namespace host::system

@@ -63,6 +63,9 @@ TEST_P(MissingPreviews, AreSaidToBeMissing)
     const auto opened = previews->open(path);
     ASSERT_TRUE(opened.error);
     EXPECT_EQ(opened.error->text(platform::errorKey::localizedDescription), PreviewModule::missingWords());
+    EXPECT_EQ(previews->makeThumbnail(path, platform::ThumbnailContent::Pages, 64)
+                  .error->text(platform::errorKey::localizedDescription),
+        PreviewModule::missingWords());
     EXPECT_EQ(host::gtk::readPrintablePages(path, host::gtk::PrintableKind::Pdf, *previews)
                   .error->text(platform::errorKey::localizedDescription),
         PreviewModule::missingWords());

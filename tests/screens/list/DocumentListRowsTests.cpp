@@ -173,7 +173,8 @@ TEST_F(DocumentList, ShowsThumbnailsOfPicturesAndMakesThemAnewWhenTheyChange)
     ASSERT_FALSE(first.isNamed());
     EXPECT_EQ(first.pixelWidth(), rowThumbnailSide);
     EXPECT_EQ(first.pixelHeight(), rowThumbnailSide / 2);
-    EXPECT_EQ(first.pixels().front(), 0xff404040U);
+    EXPECT_EQ(first.pixels().at(20 * rowThumbnailSide + 40), 0xff404040U);
+    EXPECT_EQ(first.pixels().front(), 0xff363636U) << "a darker edge";
 
     deliver(list, entries);
     EXPECT_EQ(list->listView()->row(1).image, first) << "not made again while nothing changed";
@@ -182,7 +183,7 @@ TEST_F(DocumentList, ShowsThumbnailsOfPicturesAndMakesThemAnewWhenTheyChange)
     deliver(list, entries);
     const auto second = *list->listView()->row(1).image;
     EXPECT_EQ(second.pixelHeight(), 60);
-    EXPECT_EQ(second.pixels().back(), 0xff808080U);
+    EXPECT_EQ(second.pixels().at(30 * 30 + 15), 0xff808080U);
 }
 
 /// Records the names of the items that are read.
