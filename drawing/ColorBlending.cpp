@@ -111,6 +111,8 @@ Color addedDarker(const Color& base, const Color& blend)
 
 } // namespace
 
+inline namespace TarrowDriveApp_FileTagColors {
+
 Color trw_colorBlendedWithColorCompositingFilter(
     const Color& base, const std::optional<Color>& blend, std::optional<std::string_view> filter)
 {
@@ -131,5 +133,7 @@ Color trw_colorBlendedWithColor(const Color& base, const std::optional<Color>& b
 {
     return trw_colorBlendedWithColorCompositingFilter(base, blend, compositingFilter::sourceOver);
 }
+
+} // namespace TarrowDriveApp_FileTagColors
 
 } // namespace tarrow

@@ -27,7 +27,9 @@ inline constexpr std::string_view plusDarker = "plusDarker";
 
 } // namespace compositingFilter
 
-// These compute the colour that results where one colour lies over another. Nothing is drawn. Any thread.
+/// What the program adds to the platform's colours: the colour that results where one lies over another.
+/// Nothing is drawn. Any thread.
+inline namespace TarrowDriveApp_FileTagColors {
 
 /// Answers the base colour with the blend colour over it, under the named filter; without a filter the blend
 /// colour covers the base by its opacity. Every filter but that one keeps the base colour's alpha. Answers
@@ -39,5 +41,7 @@ platform::Color trw_colorBlendedWithColorCompositingFilter(const platform::Color
 /// Does the same with the filter sourceOver.
 platform::Color trw_colorBlendedWithColor(
     const platform::Color& base, const std::optional<platform::Color>& blend);
+
+} // namespace TarrowDriveApp_FileTagColors
 
 } // namespace tarrow
