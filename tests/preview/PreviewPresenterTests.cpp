@@ -98,7 +98,7 @@ TEST_F(Presenter, ReloadsOnlyNewerContentThatSomebodySees)
 
 TEST_F(Presenter, ShowsTheNameInSafeCharactersAfterARefreshToo)
 {
-    const auto url = open("Bill\n\xE2\x80\xAE" "fdp.exe");
+    const auto url = open("Bill\n\u202Efdp\u202C.exe");
     const auto before = preview->title();
     EXPECT_THAT(before, testing::Not(HasSubstr("\n")));
     manager->refreshItem(url);
