@@ -294,6 +294,7 @@ void DocumentListController::startSearchWithQueryStringBecomeFirstResponder(
         .held = weaklyOr(false, this, &DocumentListController::peekAt),
         .heldPressedOn = weakly(
             this, [](DocumentListController& self) { self.heldRowPressedOn(*self._search->results()); }),
+        .dots = weaklyOr(std::vector<kit::TagDot>(), this, &DocumentListController::dotsForTags),
         .completed = weakly(this, &DocumentListController::endPeekAtMissingItem),
     });
     const auto presentation = _search->presentation();

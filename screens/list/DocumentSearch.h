@@ -8,6 +8,7 @@
 #include "platform/NameSearch.h"
 #include "platform/Url.h"
 #include "screens/PlatformNames.h"
+#include "screens/list/DocumentRowSource.h"
 #include "screens/list/DocumentRows.h"
 #include "screens/list/RowItem.h"
 
@@ -23,7 +24,6 @@ class ListView;
 
 namespace screens {
 
-class DocumentRowSource;
 class PlaceholderView;
 
 /// The search over a folder list. It finds the items of the whole drive whose names contain the query, and
@@ -41,6 +41,7 @@ public:
         std::function<bool(const RowItem& item, kit::RowCommand command)> command;
         std::function<bool(const RowItem& item)> held;
         std::function<void()> heldPressedOn;
+        DocumentRowSource::TagDots dots;
         /// All results of the query are known, or have changed.
         std::function<void(const DocumentRows& rows)> completed;
     };

@@ -5,6 +5,7 @@
 
 #include "tests/screens/support/DocumentListFixture.h"
 
+#include "host/drive/records/ItemFacts.h"
 #include "kit/controllers/SearchPresentation.h"
 #include "screens/FolderPlaces.h"
 
@@ -203,7 +204,7 @@ TEST_F(DocumentList, SearchesTheWholeDriveAndSaysWhereItemsLie)
 {
     drive.writeDocument("Stuff/Spain/My trip.txt");
     drive.makeFolder("Stuff/Trip");
-    drive.writeDocument("trip plan.txt");
+    drive.mark(drive.writeDocument("trip plan.txt"), host::drive::itemMark::tags, "Travel");
     const auto list = shownList(drive.url("Stuff"));
     list->startSearchWithQueryStringBecomeFirstResponder("TRIP", true);
     drive.dispatch->runUntilIdle();
@@ -228,6 +229,7 @@ TEST_F(DocumentList, SearchesTheWholeDriveAndSaysWhereItemsLie)
     std::size_t plan = 0;
     while (results->row(plan).title != "trip plan.txt")
         ++plan;
+    EXPECT_EQ(results->row(plan).tagDots.size(), 1U);
     for (const auto& entry : results->menuForRow(plan)) {
         if (entry.title != "Show in Its Folder")
             entry.handler();
