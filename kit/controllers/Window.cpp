@@ -138,10 +138,10 @@ void Window::resized(Size size, const TraitCollection& traits)
     coordinator.run();
 }
 
-void Window::showNotice(const std::string& text)
+void Window::showNotice(const std::string& text, const NoticeAction& action)
 {
     if (_visible)
-        _observer.notify([&](WindowObserver& observer) { observer.windowShowsNotice(*this, text); });
+        _observer.notify([&](WindowObserver& observer) { observer.windowShowsNotice(*this, text, action); });
 }
 
 bool Window::backRequested()

@@ -49,7 +49,7 @@ public:
 
     /// Tells the user in a sentence of something that needs no answer, such as a document that another
     /// program has deleted. The message goes by itself after a few seconds.
-    void showNotice(const std::string& text);
+    void showNotice(const std::string& text, const NoticeAction& action = {});
 
     // Events up: the host reports what happened to the window.
     void resized(Size size, const TraitCollection& traits);

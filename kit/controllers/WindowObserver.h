@@ -6,11 +6,18 @@
 #include "kit/controllers/Presentation.h"
 #include "kit/values/TransitionToken.h"
 
+#include <functional>
 #include <string>
 
 namespace kit {
 
 class Window;
+
+/// A button in a message, such as one that takes back what the message tells of.
+struct NoticeAction {
+    std::string title; ///< empty: the message has no button
+    std::function<void()> run; ///< called once, when the button is pressed
+};
 
 /// Calls down that a window makes to the host that shows it. The model has already changed when they come.
 class WindowObserver {
@@ -26,7 +33,7 @@ public:
         Window& window, const Presentation& presentation, TransitionToken token) = 0;
     /// The host shows a short message for a few seconds, without giving it the keyboard focus. A host that
     /// has no place for messages ignores it.
-    virtual void windowShowsNotice(Window&, const std::string&) { }
+    virtual void windowShowsNotice(Window&, const std::string& /*text*/, const NoticeAction&) { }
 };
 
 } // namespace kit

@@ -15,6 +15,7 @@ struct TraitCollection {
     SizeClass verticalSizeClass = SizeClass::Regular;
     LayoutDirection layoutDirection = LayoutDirection::LeftToRight;
     ColorScheme colorScheme = ColorScheme::Light;
+    double displayScale = 1; ///< device pixels to a point
 
     bool isRightToLeft() const { return layoutDirection == LayoutDirection::RightToLeft; }
 

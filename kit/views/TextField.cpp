@@ -117,13 +117,20 @@ void TextField::setInputTraits(const TextInputTraits& traits)
     changed(ViewChange::Content);
 }
 
+void TextField::setFieldStyle(FieldStyle style)
+{
+    if (style == _fieldStyle)
+        return;
+    _fieldStyle = style;
+    changed(ViewChange::Content);
+}
+
 void TextField::setSelectedRange(TextRange range)
 {
     const std::size_t end = length();
     range.location = std::min(range.location, end);
     range.length = std::min(range.length, end - range.location);
-    if (range == _selection)
-        return;
+    // The observer is told of an equal range, too, because the native field may be about to select another one.
     _selection = range;
     changed(ViewChange::Selection);
 }
@@ -138,6 +145,7 @@ bool TextField::becomeFirstResponder()
         return false;
     }
     _editing = true;
+    changed(ViewChange::Content);
     askForFocus(true);
     if (delegate)
         delegate->textFieldDidBeginEditing(*this);
@@ -157,6 +165,7 @@ bool TextField::resignFirstResponder()
     if (!_editing)
         return true;
     _editing = false;
+    changed(ViewChange::Content);
     askForFocus(false);
     if (delegate)
         delegate->textFieldDidEndEditing(*this);

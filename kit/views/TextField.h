@@ -14,6 +14,8 @@ enum class ReturnKey { Default, Done, Search };
 enum class Capitalization { None, Words, Sentences };
 enum class Autocorrection { Default, Off };
 enum class ClearButton { Never, WhileEditing };
+/// A framed field stands out from its surroundings; a plain one is a line of text that can be edited.
+enum class FieldStyle { Framed, Plain };
 
 /// Says how the on-screen keyboard and the field's own controls look and behave.
 struct TextInputTraits {
@@ -43,6 +45,8 @@ public:
     void setAlignment(TextAlignment alignment);
     const TextInputTraits& inputTraits() const { return _inputTraits; }
     void setInputTraits(const TextInputTraits& traits);
+    FieldStyle fieldStyle() const { return _fieldStyle; }
+    void setFieldStyle(FieldStyle style);
     TextRange selectedRange() const { return _selection; }
     void setSelectedRange(TextRange range); ///< cut to the length of the text
     std::size_t length() const; ///< in characters
@@ -54,6 +58,7 @@ public:
     bool isEditing() const { return _editing; }
     bool becomeFirstResponder() override; ///< begins editing when the delegate allows it
     bool resignFirstResponder() override; ///< ends editing when the delegate allows it
+    bool isFirstResponder() const override { return _editing; }
 
     // Events up: the host reports what the user did.
     /// The native field now shows this text with this selection. Answers false when the edit was refused; the
@@ -75,6 +80,7 @@ private:
     Font _font = Font::preferred(TextStyle::Body);
     TextAlignment _alignment = TextAlignment::Natural;
     TextInputTraits _inputTraits;
+    FieldStyle _fieldStyle = FieldStyle::Framed;
     TextRange _selection;
     std::weak_ptr<TextFieldDelegate> _delegate;
     std::function<void()> _onEditingChanged;

@@ -104,6 +104,7 @@ public:
 
     virtual bool becomeFirstResponder() { return false; } ///< a plain view never takes the focus
     virtual bool resignFirstResponder() { return true; }
+    virtual bool isFirstResponder() const { return false; }
     void endEditing(); ///< the focus leaves this view and everything below, where that is allowed
 
 protected:
@@ -115,10 +116,11 @@ protected:
     void layOutContent() override;
     void layoutDidBecomeStale() override;
     virtual void subviewVisibilityDidChange() { }
+    /// The traits of the view changed. Overriders call the base class, which tells the subviews.
+    virtual void traitsDidChange();
     virtual void willRemoveSubview(View&) { }
 
 private:
-    void traitsDidChange();
     void resizeWithSuperview(double widthChange, double heightChange);
     Point originInRoot() const;
 

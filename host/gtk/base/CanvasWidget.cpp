@@ -131,7 +131,8 @@ void allocateChild(GtkWidget* child, const platform::Rect& frame)
 {
     if (!gtk_widget_should_layout(child))
         return;
-    const double x = std::round(frame.x), y = std::round(frame.y);
+    const double scale = gtk_widget_get_scale_factor(child);
+    const double x = std::round(frame.x * scale) / scale, y = std::round(frame.y * scale) / scale;
     int minimumWidth = 0, minimumHeight = 0;
     gtk_widget_measure(child, GTK_ORIENTATION_HORIZONTAL, -1, &minimumWidth, nullptr, nullptr, nullptr);
     // A width such as 83.999 comes from the solver's arithmetic, and must not cost a text its last letter.

@@ -39,7 +39,8 @@ void setClient(GtkWidget* canvas, CanvasClient* client);
 /// Puts a child behind `previous`, or at the very back when that is null.
 void insertAfter(GtkWidget* canvas, GtkWidget* child, GtkWidget* previous);
 
-/// Allocates a child at a rectangle on whole points, at least as large as the child's minimum size.
+/// Allocates a child at a rectangle, at least as large as the child's minimum size. The origin lies on a
+/// device pixel, the size is rounded up to whole points, as the toolkit has no others.
 void allocateChild(GtkWidget* child, const platform::Rect& frame);
 void snapshotChildren(GtkWidget* canvas, GtkSnapshot* snapshot);
 

@@ -66,6 +66,8 @@ void ViewPeer::start()
         return;
     shown->setObserver(weak_from_this());
     mirror(*shown, everything);
+    if (shown->isFirstResponder())
+        viewWantsFocus(*shown, true);
 }
 
 void ViewPeer::setNative(GtkWidget* native)
@@ -230,9 +232,19 @@ void ViewPeer::canvasAllocate(int width, int height)
     }
     _allocated = size;
     if (_native)
-        CanvasWidget::allocateChild(_native.get(), {0, 0, size.width, size.height});
+        allocateNative(size);
     if (childContainer() == _canvas.get())
         allocateChildren();
+}
+
+/// A native widget that needs more height than its view has, such as a text field with large text, stands out
+/// at both ends alike.
+void ViewPeer::allocateNative(Size place)
+{
+    int minimum = 0;
+    gtk_widget_measure(_native.get(), GTK_ORIENTATION_VERTICAL, -1, &minimum, nullptr, nullptr, nullptr);
+    const double missing = std::max(0.0, minimum - place.height);
+    CanvasWidget::allocateChild(_native.get(), {0, -missing / 2, place.width, place.height});
 }
 
 Point ViewPeer::childOrigin() const
@@ -268,8 +280,8 @@ void ViewPeer::canvasSnapshot(GtkSnapshot* snapshot)
     if (!shown)
         return;
     const auto& style = shown->style();
-    const auto shape =
-        shapeOf(style, gtk_widget_get_width(_canvas.get()), gtk_widget_get_height(_canvas.get()));
+    const auto size = paintedSize(*shown);
+    const auto shape = shapeOf(style, size.width, size.height);
     snapshotBackground(*shown, snapshot, shape);
     if (style.clipsToBounds)
         gtk_snapshot_push_rounded_clip(snapshot, &shape);
@@ -278,6 +290,15 @@ void ViewPeer::canvasSnapshot(GtkSnapshot* snapshot)
     if (style.clipsToBounds)
         gtk_snapshot_pop(snapshot);
     snapshotBorder(*shown, snapshot, shape);
+}
+
+/// Widgets have whole points, but a view may be thinner than a point where pixels are smaller.
+Size ViewPeer::paintedSize(const View& shown) const
+{
+    const Size widget{static_cast<double>(gtk_widget_get_width(_canvas.get())),
+        static_cast<double>(gtk_widget_get_height(_canvas.get()))};
+    const auto& frame = shown.frame();
+    return {std::min(widget.width, frame.width), std::min(widget.height, frame.height)};
 }
 
 void ViewPeer::snapshotBackground(const View& shown, GtkSnapshot* snapshot, const GskRoundedRect& shape)

@@ -77,11 +77,13 @@ protected:
 
 private:
     void mirrorPending();
+    void allocateNative(platform::Size place);
     void mirrorSubviews(const kit::View& shown);
     void mirrorAccessibility(const kit::View& shown);
     void mirrorGestures(const kit::View& shown);
     void dropFocus();
     void queueAllocateInParent() const;
+    platform::Size paintedSize(const kit::View& shown) const;
     void snapshotBackground(const kit::View& shown, GtkSnapshot* snapshot, const GskRoundedRect& shape);
     void snapshotBorder(const kit::View& shown, GtkSnapshot* snapshot, const GskRoundedRect& shape);
     void snapshotDrawing(const kit::View& shown, GtkSnapshot* snapshot);

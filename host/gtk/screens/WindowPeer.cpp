@@ -8,13 +8,17 @@
 #include "host/gtk/screens/LayerFactory.h"
 #include "host/gtk/screens/ToastTitle.h"
 #include "kit/controllers/ViewController.h"
+#include "kit/values/KeyboardNotice.h"
 #include "platform/Localization.h"
+#include "platform/NotificationCenter.h"
+#include "platform/Services.h"
 #include "platform/Weakly.h"
 
 #include <algorithm>
 
 namespace host::gtk {
 using platform::Size;
+using platform::weakly;
 
 namespace {
 
@@ -82,6 +86,10 @@ void WindowPeer::build(AdwApplication* application, const WindowSize& size)
 
 void WindowPeer::connectWindow()
 {
+    _connections.push_back(connectNotify(_window.get(), "notify::scale-factor", [this] {
+        if (_bin->size().width > 0)
+            resized(_bin->size());
+    }));
     _connections.push_back(connectNotify(_window.get(), "notify::is-active", [this] {
         if (const auto call = _onFocusLost; call && !gtk_window_is_active(window()))
             call();
@@ -175,6 +183,7 @@ kit::TraitCollection WindowPeer::traits(Size size) const
     traits.layoutDirection = gtk_widget_get_direction(_window.get()) == GTK_TEXT_DIR_RTL
         ? kit::LayoutDirection::RightToLeft
         : kit::LayoutDirection::LeftToRight;
+    traits.displayScale = gtk_widget_get_scale_factor(_window.get());
     traits.colorScheme = _theme->isDark() ? kit::ColorScheme::Dark : kit::ColorScheme::Light;
     return traits;
 }
@@ -194,6 +203,23 @@ void WindowPeer::resized(Size size)
     kit::TraitCollection::setApplication(traits(size));
     if (const auto shown = model())
         shown->resized(size, traits(size));
+    const auto* focused = gtk_window_get_focus(window());
+    const auto event = _keyboard.resized(size, focused && GTK_IS_TEXT(focused));
+    if (event != KeyboardWatch::Event::None)
+        // The screens know their new places in the next frame.
+        _context->scheduler().schedule(&_keyboard, weakly(this, &WindowPeer::tellOfKeyboard, event));
+}
+
+/// The keyboard stands below the window, which has made room for it.
+void WindowPeer::tellOfKeyboard(KeyboardWatch::Event event) const
+{
+    const auto size = _bin->size();
+    kit::KeyboardNotice notice;
+    notice.beginFrame = notice.endFrame = {0, size.height, size.width, _keyboard.height()};
+    platform::services().notificationCenter().post(event == KeyboardWatch::Event::Appears
+            ? platform::Notification::KeyboardWillShow
+            : platform::Notification::KeyboardWillHide,
+        notice.toUserInfo());
 }
 
 void WindowPeer::themeChanged()
@@ -256,7 +282,7 @@ void WindowPeer::windowWillDismiss(
     const bool moves =
         presentation.animated && _theme->animationsEnabled() && gtk_widget_get_mapped(_overlay);
     _leaving.push_back(gone.layer);
-    const auto hasGone = platform::weakly(
+    const auto hasGone = weakly(
         this, [layer = std::weak_ptr(gone.layer)](WindowPeer& self) { self.layerHasGone(layer.lock()); });
     gone.layer->hide(moves, [hasGone, token] {
         hasGone();
@@ -264,11 +290,15 @@ void WindowPeer::windowWillDismiss(
     });
 }
 
-void WindowPeer::windowShowsNotice(kit::Window&, const std::string& text)
+void WindowPeer::windowShowsNotice(kit::Window&, const std::string& text, const kit::NoticeAction& action)
 {
     constexpr int lines = 3;
     auto* toast = adw_toast_new("");
     adw_toast_set_custom_title(toast, makeToastTitle(text, lines));
+    if (!action.title.empty()) {
+        adw_toast_set_button_label(toast, action.title.c_str());
+        connectForLife<void()>(toast, "button-clicked", action.run);
+    }
     adw_toast_overlay_add_toast(_toasts, toast);
 }
 

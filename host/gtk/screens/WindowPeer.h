@@ -6,6 +6,7 @@
 #include "host/gtk/base/PangoTextMeasurer.h"
 #include "host/gtk/base/PeerContext.h"
 #include "host/gtk/base/SizedBin.h"
+#include "host/gtk/screens/KeyboardWatch.h"
 #include "host/gtk/screens/PresentedLayer.h"
 #include "host/gtk/screens/ScreenPeer.h"
 #include "kit/controllers/Window.h"
@@ -62,7 +63,8 @@ public:
         kit::Window& window, const kit::Presentation& presentation, kit::TransitionToken token) override;
     void windowWillDismiss(
         kit::Window& window, const kit::Presentation& presentation, kit::TransitionToken token) override;
-    void windowShowsNotice(kit::Window& window, const std::string& text) override;
+    void windowShowsNotice(
+        kit::Window& window, const std::string& text, const kit::NoticeAction& action) override;
 
 private:
     struct Layer {
@@ -79,6 +81,7 @@ private:
     kit::TraitCollection traits(platform::Size size) const;
     void updateScreen(platform::Size size) const;
     void themeChanged();
+    void tellOfKeyboard(KeyboardWatch::Event event) const;
     void coverAllButTop();
     void giveFocusBack(GtkWidget* before) const;
     void layerHasGone(const std::shared_ptr<PresentedLayer>& layer);
@@ -91,6 +94,7 @@ private:
     std::shared_ptr<PeerContext> _context;
     ObjectRef<GtkWidget> _window;
     std::unique_ptr<SizedBin> _bin;
+    KeyboardWatch _keyboard;
     AdwToastOverlay* _toasts = nullptr;
     GtkWidget* _overlay = nullptr;
     std::shared_ptr<ScreenPeer> _root;

@@ -26,6 +26,25 @@ float horizontalAlign(kit::TextAlignment alignment, bool rightToLeft)
     return 0;
 }
 
+/// Answers the share of the free room that stands to the left of a drawn text.
+double shareOfRoomBefore(kit::TextAlignment alignment, bool rightToLeft)
+{
+    const double fromStart = horizontalAlign(alignment, rightToLeft);
+    return rightToLeft ? 1 - fromStart : fromStart;
+}
+
+PangoAlignment pangoAlignment(kit::TextAlignment alignment)
+{
+    switch (alignment) {
+    case kit::TextAlignment::Center:
+        return PANGO_ALIGN_CENTER;
+    case kit::TextAlignment::Right:
+        return PANGO_ALIGN_RIGHT;
+    default:
+        return PANGO_ALIGN_LEFT;
+    }
+}
+
 GtkJustification justification(kit::TextAlignment alignment)
 {
     switch (alignment) {
@@ -95,8 +114,14 @@ void LabelPeer::mirror(kit::View& shown, kit::ViewChanges changes)
     const auto label = _label.lock();
     if (!label || !changes.contains(kit::ViewChange::Content))
         return;
+    const bool drawn = isDrawn(*label);
     showLabel(GTK_LABEL(native()), *label, context().theme());
-    gtk_widget_set_opacity(native(), isDrawn(*label) ? 0 : 1);
+    gtk_widget_set_opacity(native(), drawn ? 0 : 1);
+    // Assistive technology reads the invisible label, and shall not hear a placeholder for each image.
+    if (drawn) {
+        gtk_label_set_attributes(GTK_LABEL(native()), nullptr);
+        gtk_label_set_label(GTK_LABEL(native()), label->text().c_str());
+    }
     gtk_widget_queue_draw(widget());
 }
 
@@ -110,8 +135,8 @@ void LabelPeer::canvasSnapshot(GtkSnapshot* snapshot)
     const auto pango = ObjectRef<PangoContext>::adopt(gtk_widget_create_pango_context(widget()));
     const auto layout = TextLayout::make(pango.get(), TextLayout::text(*label->attributedText()),
         attributesOf(*label, context().theme()), {width, label->maxLines()});
-    if (label->alignment() == kit::TextAlignment::Center)
-        pango_layout_set_alignment(layout.get(), PANGO_ALIGN_CENTER);
+    const bool rightToLeft = gtk_widget_get_direction(widget()) == GTK_TEXT_DIR_RTL;
+    pango_layout_set_alignment(layout.get(), pangoAlignment(label->alignment()));
     PangoRectangle logical;
     pango_layout_get_pixel_extents(layout.get(), nullptr, &logical);
     graphene_rect_t bounds;
@@ -120,7 +145,8 @@ void LabelPeer::canvasSnapshot(GtkSnapshot* snapshot)
     GdkRGBA color;
     gtk_style_context_get_color(gtk_widget_get_style_context(widget()), &color);
     gdk_cairo_set_source_rgba(cairo, &color);
-    cairo_move_to(cairo, 0, (height - logical.height) / 2);
+    const double share = shareOfRoomBefore(label->alignment(), rightToLeft);
+    cairo_move_to(cairo, (width - logical.width) * share - logical.x, (height - logical.height) / 2);
     TextLayout::draw(cairo, layout.get());
     cairo_destroy(cairo);
 }

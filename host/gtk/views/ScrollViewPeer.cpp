@@ -3,6 +3,10 @@
 
 #include "host/gtk/views/ScrollViewPeer.h"
 
+#include "platform/Weakly.h"
+
+#include <algorithm>
+
 namespace host::gtk {
 using platform::Point;
 using platform::Size;
@@ -24,7 +28,11 @@ public:
         const auto& insets = view->contentInsets();
         return {content.width + insets.left + insets.right, content.height + insets.top + insets.bottom};
     }
-    void canvasAllocate(int, int) override { _peer.allocateChildren(); }
+    void canvasAllocate(int, int) override
+    {
+        _peer.allocateChildren();
+        _peer.followOffset();
+    }
     void canvasSnapshot(GtkSnapshot* snapshot) override
     {
         CanvasWidget::snapshotChildren(_peer._content.get(), snapshot);
@@ -77,6 +85,23 @@ void ScrollViewPeer::scrollTo(kit::ScrollView& view, Point offset, bool /*animat
     const auto& insets = view.contentInsets();
     gtk_adjustment_set_value(gtk_scrolled_window_get_hadjustment(window), offset.x + insets.left);
     gtk_adjustment_set_value(gtk_scrolled_window_get_vadjustment(window), offset.y + insets.top);
+}
+
+/// An offset that was set along with a larger content waits for the room that the content gives.
+void ScrollViewPeer::followOffset()
+{
+    const auto view = _scrollView.lock();
+    if (!view)
+        return;
+    auto* vertical = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(native()));
+    const double wanted = view->contentOffset().y + view->contentInsets().top;
+    const double reachable =
+        std::min(wanted, gtk_adjustment_get_upper(vertical) - gtk_adjustment_get_page_size(vertical));
+    if (gtk_adjustment_get_value(vertical) < reachable)
+        context().scheduler().schedule(&_onVertical, platform::weakly(this, [](ScrollViewPeer& self) {
+            if (const auto scrolled = self._scrollView.lock())
+                self.scrollTo(*scrolled, scrolled->contentOffset(), false);
+        }));
 }
 
 void ScrollViewPeer::scrollExtentDidChange(kit::ScrollView& view)

@@ -25,6 +25,7 @@ protected:
 private:
     class Content;
     void adjusted();
+    void followOffset();
     void mirrorBehavior(const kit::ScrollView& view);
 
     std::weak_ptr<kit::ScrollView> _scrollView;

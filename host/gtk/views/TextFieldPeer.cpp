@@ -59,8 +59,59 @@ void TextFieldPeer::connectEvents()
         [entry](GtkEntryIconPosition) { gtk_editable_set_text(GTK_EDITABLE(entry), ""); }));
     auto* focus = gtk_event_controller_focus_new();
     gtk_widget_add_controller(entry, focus);
-    connect(connectSignal<void()>(focus, "enter", platform::weakly(_field, &kit::TextField::userFocused)));
-    connect(connectSignal<void()>(focus, "leave", platform::weakly(_field, &kit::TextField::userLeft)));
+    connect(connectSignal<void()>(focus, "enter", [this] { entered(); }));
+    connect(connectSignal<void()>(focus, "leave", [this] { left(); }));
+}
+
+void TextFieldPeer::viewDidChange(kit::View& view, kit::ViewChanges changes)
+{
+    ViewPeer::viewDidChange(view, changes);
+    const auto field = _field.lock();
+    if (_isEntering && field && changes.contains(kit::ViewChange::Selection))
+        _wantedSelection = field->selectedRange();
+}
+
+/// The entry selects its text, or puts the caret where it was clicked, after it has got the focus. What the
+/// field's delegate has selected then counts all the same.
+void TextFieldPeer::entered()
+{
+    const auto keepsSelf = shared_from_this();
+    const auto field = _field.lock();
+    if (!field)
+        return;
+    _isEntering = true;
+    _wantedSelection.reset();
+    field->userFocused();
+    _isEntering = false;
+    if (!_wantedSelection)
+        return;
+    context().scheduler().schedule(
+        &_wantedSelection, platform::weakly(this, [range = *_wantedSelection](TextFieldPeer& self) {
+            if (const auto entered = self._field.lock())
+                entered->setSelectedRange(range);
+        }));
+}
+
+/// The focus also leaves a field whose window is not the active one any more, or over which an alert lies. It
+/// comes back to that field afterwards, so the editing goes on.
+void TextFieldPeer::left()
+{
+    const auto keepsSelf = shared_from_this();
+    auto* root = gtk_widget_get_root(native());
+    auto* focused = root ? gtk_root_get_focus(root) : nullptr;
+    const bool isKept = focused && (focused == native() || gtk_widget_is_ancestor(focused, native()));
+    if (isKept && GTK_IS_WINDOW(root) && !gtk_window_is_active(GTK_WINDOW(root)))
+        return;
+    for (auto* widget = native(); widget; widget = gtk_widget_get_parent(widget)) {
+        if (!gtk_widget_get_can_focus(widget))
+            return;
+    }
+    const auto field = _field.lock();
+    if (!field || !field->userLeft())
+        return;
+    // A selection that stays visible looks as if the next key would replace it.
+    const int caret = gtk_editable_get_position(GTK_EDITABLE(native()));
+    gtk_editable_select_region(GTK_EDITABLE(native()), caret, caret);
 }
 
 void TextFieldPeer::edited()
@@ -115,6 +166,10 @@ void TextFieldPeer::mirrorContent(const kit::TextField& field)
         entry, traits.isSecret ? GTK_INPUT_PURPOSE_PASSWORD : GTK_INPUT_PURPOSE_FREE_FORM);
     gtk_entry_set_visibility(entry, !traits.isSecret);
     gtk_entry_set_attributes(entry, TextLayout::attributes(context().theme(), field.font(), nullptr).get());
+    if (field.fieldStyle() == kit::FieldStyle::Plain)
+        gtk_widget_add_css_class(native(), "plain-field");
+    else
+        gtk_widget_remove_css_class(native(), "plain-field");
     mirrorClearButton(field);
     gtk_editable_set_alignment(
         GTK_EDITABLE(entry), field.alignment() == kit::TextAlignment::Center ? 0.5F : 0.0F);
@@ -126,10 +181,16 @@ void TextFieldPeer::mirrorContent(const kit::TextField& field)
 
 void TextFieldPeer::mirrorClearButton(const kit::TextField& field)
 {
-    const bool clears =
-        field.inputTraits().clearButton == kit::ClearButton::WhileEditing && !field.text().empty();
+    const bool clears = field.inputTraits().clearButton == kit::ClearButton::WhileEditing && field.isEditing()
+        && !field.text().empty();
     gtk_entry_set_icon_from_icon_name(
         GTK_ENTRY(native()), GTK_ENTRY_ICON_SECONDARY, clears ? "edit-clear-symbolic" : nullptr);
+    // The entry keeps the room of an icon that is not there, and its text is then beside the middle.
+    for (auto* child = gtk_widget_get_first_child(native()); child;
+         child = gtk_widget_get_next_sibling(child)) {
+        if (GTK_IS_IMAGE(child))
+            gtk_widget_set_visible(child, clears);
+    }
 }
 
 void TextFieldPeer::setAccessibleName(const std::string& name)

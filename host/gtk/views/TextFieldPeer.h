@@ -4,6 +4,9 @@
 #pragma once
 
 #include "host/gtk/base/ViewPeer.h"
+#include "kit/views/TextFieldDelegate.h"
+
+#include <optional>
 
 namespace kit {
 class TextField;
@@ -16,6 +19,7 @@ class TextFieldPeer : public ViewPeer {
 public:
     TextFieldPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::TextField>& field);
 
+    void viewDidChange(kit::View& view, kit::ViewChanges changes) override;
     bool grabFocus() override;
     /// Answers the entry's own height, because the theme wants more room around a text than its line has.
     std::optional<platform::Size> nativeSize(const kit::View& view, double maxWidth) override;
@@ -30,6 +34,8 @@ protected:
 private:
     void connectEvents();
     void edited();
+    void entered();
+    void left();
     void selectionMoved();
     void returnPressed();
     void mirrorContent(const kit::TextField& field);
@@ -39,6 +45,8 @@ private:
     std::weak_ptr<kit::TextField> _field;
     SignalConnection _onChanged, _onCursor, _onBound;
     std::function<void()> _onReturn;
+    std::optional<kit::TextRange> _wantedSelection; ///< what the delegate selected when the field was entered
+    bool _isEntering = false;
 };
 
 } // namespace host::gtk

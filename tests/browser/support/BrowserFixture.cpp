@@ -30,7 +30,10 @@ public:
     {
         token.finish();
     }
-    void windowShowsNotice(Window&, const std::string& text) override { texts.push_back(text); }
+    void windowShowsNotice(Window&, const std::string& text, const kit::NoticeAction&) override
+    {
+        texts.push_back(text);
+    }
 
     std::vector<std::string> texts;
 };

@@ -2,6 +2,8 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "WindowFixture.h"
+#include "host/gtk/screens/KeyboardWatch.h"
+#include "kit/controllers/AlertController.h"
 #include "kit/controllers/ViewController.h"
 #include "kit/views/Button.h"
 #include "kit/views/Label.h"
@@ -137,6 +139,99 @@ TEST_F(PeerTests, AFieldHidesASecretAndShowsTheNextText)
         field->setInputTraits({.isSecret = isSecret});
         settle();
         EXPECT_EQ(gtk_entry_get_visibility(GTK_ENTRY(nativeOf(*field))) != FALSE, !isSecret);
+    }
+}
+
+TEST_F(PeerTests, AFieldThatIsTooLowForItsTextStandsOutOnBothSides)
+{
+    const auto field = std::make_shared<kit::TextField>("Report.pdf");
+    field->setFieldStyle(kit::FieldStyle::Plain);
+    field->setFont(kit::Font::preferred(kit::TextStyle::Title2, 40));
+    showOne(field, {10, 100, 300, 20});
+    graphene_rect_t place;
+    ASSERT_TRUE(gtk_widget_compute_bounds(nativeOf(*field), peerOf(*field)->widget(), &place));
+    EXPECT_GT(place.size.height, 30);
+    EXPECT_NEAR(place.origin.y + place.size.height / 2, 10, 1);
+}
+
+TEST_F(PeerTests, TheEditingOutlivesAnAlertOverTheField)
+{
+    const auto field = std::make_shared<kit::TextField>("Report.pdf");
+    const auto screen = makeScreen("");
+    field->setFrame({10, 10, 300, 40});
+    screen->view()->addSubview(field);
+    show(screen);
+    ASSERT_TRUE(field->becomeFirstResponder());
+    settle();
+    const auto alert =
+        std::make_shared<kit::AlertController>("No", "This name is taken", kit::AlertStyle::Alert);
+    alert->addAction(std::make_shared<kit::AlertAction>("OK", kit::AlertActionStyle::Default));
+    screen->presentViewController(alert, false);
+    settle();
+    EXPECT_TRUE(field->isEditing());
+    screen->dismissViewController(false);
+    settle();
+    EXPECT_TRUE(field->isEditing());
+    auto* focused = gtk_window_get_focus(peer().window());
+    EXPECT_TRUE(focused && gtk_widget_is_ancestor(focused, nativeOf(*field))) << "the focus is back";
+    gtk_window_set_focus(peer().window(), nullptr);
+    settle();
+    EXPECT_FALSE(field->isEditing());
+}
+
+TEST_F(PeerTests, AViewIsPaintedInItsOwnSizeAndNotInWholePoints)
+{
+    const auto line = std::make_shared<kit::View>();
+    line->setBackground(platform::Color{1, 0, 0, 1});
+    showOne(line, {10, 10, 100, 0.5});
+    auto* snapshot = gtk_snapshot_new();
+    peerOf(*line)->canvasSnapshot(snapshot);
+    auto* node = gtk_snapshot_free_to_node(snapshot);
+    ASSERT_TRUE(node);
+    graphene_rect_t painted;
+    gsk_render_node_get_bounds(node, &painted);
+    EXPECT_EQ(painted.size.width, 100);
+    EXPECT_EQ(painted.size.height, 0.5F);
+    gsk_render_node_unref(node);
+}
+
+TEST_F(PeerTests, AssistiveTechnologyHearsNoPlaceholdersForImages)
+{
+    const auto label = std::make_shared<kit::Label>();
+    kit::AttributedText text;
+    text.append(platform::Image::fromPixels(4, 4, 1, {}));
+    text.append("Red ");
+    text.append(platform::Image::fromPixels(4, 4, 1, {}));
+    text.append("Work");
+    label->setAttributedText(text);
+    showOne(label, {10, 10, 200, 20});
+    EXPECT_STREQ(gtk_label_get_label(GTK_LABEL(nativeOf(*label))), "Red Work");
+}
+
+TEST(KeyboardWatch, ATallStepWhileATextHasTheFocusIsAKeyboard)
+{
+    using Event = host::gtk::KeyboardWatch::Event;
+    const struct {
+        platform::Size size;
+        bool textHasFocus;
+        Event event;
+        double height;
+    } steps[] = {
+        {{360, 640}, true, Event::None, 0},
+        {{360, 400}, false, Event::None, 0},
+        {{360, 640}, true, Event::None, 0},
+        {{360, 600}, true, Event::None, 0}, // somebody drags the window's edge
+        {{360, 340}, true, Event::Appears, 260},
+        {{360, 300}, true, Event::None, 260}, // the keyboard shows a row more
+        {{360, 600}, true, Event::Disappears, 0},
+        {{360, 340}, true, Event::Appears, 260},
+        {{640, 300}, true, Event::Disappears, 0}, // the device was turned
+        {{300, 100}, true, Event::None, 0},
+    };
+    host::gtk::KeyboardWatch watch;
+    for (const auto& step : steps) {
+        EXPECT_EQ(watch.resized(step.size, step.textHasFocus), step.event) << &step - steps;
+        EXPECT_EQ(watch.height(), step.height) << &step - steps;
     }
 }
 
