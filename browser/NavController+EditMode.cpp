@@ -52,6 +52,7 @@ void NavController::initNewListController(const List& list)
     _viewTitle = list->title();
     logNewList(list);
     list->setAvailableActions(offeredActions);
+    list->setEditTags(weakly(this, &NavController::editTagsOfItems));
     configureNavBar(list);
     if (list->title().empty())
         op.warning("Warning: newList title not set");

@@ -19,6 +19,7 @@
 #include "preview/PreviewMode.h"
 #include "prompts/NewFolderPrompt.h"
 #include "prompts/RenamePrompt.h"
+#include "prompts/TagEditing.h"
 #include "prompts/UIUtils.h"
 #include "screens/DrivePlaces.h"
 #include "screens/list/DocumentListController.h"
@@ -161,6 +162,13 @@ void NavController::performInfo(const Url& url, const Completion& completion)
             call(completion);
         },
         completion);
+}
+
+void NavController::editTagsOfItems(const std::vector<Url>& items)
+{
+    static constexpr Operation op{"-[NavController editTagsOfItems:]"};
+    op.userAction("Edit Tags");
+    TagEditing::begin(items, self());
 }
 
 void NavController::promtForNewFolderAndCreate(const Sender&)

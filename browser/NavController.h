@@ -239,6 +239,7 @@ private:
     void performDelete(
         const platform::Url& url, const std::shared_ptr<kit::View>& view, const Completion& completion);
     void performInfo(const platform::Url& url, const Completion& completion);
+    void editTagsOfItems(const std::vector<platform::Url>& items);
     /// Looks at the disk on another thread and goes on with what was found, unless a person has asked for
     /// something else since or has left the screen. `dropped` is called in that case.
     template <typename Look, typename Then>

@@ -192,6 +192,8 @@ kit::Menu DocumentListController::menuFor(const RowItem& item)
     if (item.isPromise)
         menu.push_back(downloadEntry(item.url));
     for (const auto& entry : menuEntries) {
+        if (entry.action == DocumentListAction::Delete && item.kind != FolderEntryKind::Library)
+            addTagsEntry(menu, {item.url});
         if (!offers(entry.action, item.kind))
             continue;
         auto chosen = weakly(this, &DocumentListController::perform, entry.action, item.url);

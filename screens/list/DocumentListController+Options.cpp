@@ -43,6 +43,14 @@ void DocumentListController::setOrder(const ListOrder& order)
     refresh();
 }
 
+void DocumentListController::addTagsEntry(kit::Menu& menu, std::vector<Url> items) const
+{
+    if (_editTags && !items.empty())
+        menu.push_back({.title = localized("Tags…"),
+            .handler = [edit = _editTags, items = std::move(items)] { edit(items); },
+            .image = {}});
+}
+
 kit::Menu DocumentListController::optionsMenu()
 {
     kit::Menu menu;
@@ -58,6 +66,7 @@ kit::Menu DocumentListController::optionsMenu()
             .handler = weakly(this, &DocumentListController::selectAllItems)});
         menu.push_back({.title = localized("Select None"),
             .handler = weakly(this, &DocumentListController::deselectAllItems)});
+        addTagsEntry(menu, selectedItems());
     }
     const auto firstChoice = menu.size();
     for (const auto& entry : keyEntries)

@@ -88,6 +88,10 @@ public:
     /// The actions that an item's menu offers. There are none at first.
     DocumentListActionSet availableActions() const { return _availableActions; }
     void setAvailableActions(DocumentListActionSet actions) { _availableActions = actions; }
+    /// The menus of an item and of the selected items offer to change their tags, and call this function with
+    /// these items. Without a function they do not.
+    using EditTags = std::function<void(const std::vector<Url>& items)>;
+    void setEditTags(EditTags editTags) { _editTags = std::move(editTags); }
 
     /// Presents the search field with a query over the list. With `becomeFirstResponder` the field takes the
     /// keyboard focus. The search looks through the names of the whole drive.
@@ -113,6 +117,7 @@ public:
     void setOrder(const ListOrder& order);
     /// Answers the menu of orders and, while the list is editing, of selections.
     kit::Menu optionsMenu();
+    void addTagsEntry(kit::Menu& menu, std::vector<Url> items) const;
 
     /// Other classes attach objects to the list, which keeps them as long as it lives; null removes one. Ask
     /// with the type with which the object was attached, because the type is not checked.
@@ -197,6 +202,7 @@ private:
     std::map<std::size_t, Url> _actions; ///< by their numbers, the items whose actions have not ended
     std::size_t _lastAction = 0;
     DocumentListActionSet _availableActions = 0;
+    EditTags _editTags;
     ListOrder _order;
     bool _editing = false;
     std::optional<ListingStage> _state; ///< the stage of the latest update; absent before the first
