@@ -124,7 +124,7 @@ void PreviewBaseViewController::viewWillLayoutSubviews()
     ViewController::viewWillLayoutSubviews();
     const auto insets = scrollViewDefaultEdgeInsets();
     auto frame = view()->bounds();
-    frame.height = std::max(0.0, frame.height - (insets.top + insets.bottom));
+    frame.height = contentHeight(std::max(0.0, frame.height - (insets.top + insets.bottom)));
     _contentView->setFrame(frame);
     _scrollView->setContentSize({frame.width, frame.height});
     configureMargins();
@@ -155,8 +155,12 @@ int PreviewBaseViewController::currentPseudoOrientation() const
     const auto& shown = traits();
     if (shown.horizontalSizeClass == SizeClass::Compact && shown.verticalSizeClass == SizeClass::Regular)
         return static_cast<int>(InterfaceOrientation::Portrait);
-    const auto inWindow = window();
-    return static_cast<int>(inWindow ? inWindow->interfaceOrientation() : InterfaceOrientation::Portrait);
+    if (const auto inWindow = window())
+        return static_cast<int>(inWindow->interfaceOrientation());
+    // A screen that is being made is in no window yet, but it will be in the only one.
+    const auto& screen = kit::Screen::main();
+    const bool lies = screen && screen->bounds.width > screen->bounds.height;
+    return static_cast<int>(lies ? InterfaceOrientation::LandscapeLeft : InterfaceOrientation::Portrait);
 }
 
 bool PreviewBaseViewController::hasItemURL() const
@@ -213,13 +217,19 @@ void PreviewBaseViewController::configureButtons()
         navigation->setToolbarHidden(isTablet);
     if (isTablet) {
         setToolbarItems({});
-        navigationItem().setRightItems(
+        showRightBarButtonItems(
             {_barButtonActionItem, fixed, _barButtonDeleteItem, otherFixed, _barButtonMoveItem});
         return;
     }
     setToolbarItems(
         {_barButtonActionItem, flexible, _barButtonDeleteItem, otherFlexible, _barButtonMoveItem});
-    navigationItem().setRightItem(_mode == PreviewModeDetails ? openIn : nullptr);
+    const bool showsOpenIn = openIn && _mode == PreviewModeDetails;
+    showRightBarButtonItems(showsOpenIn ? kit::BarButtonItems{openIn} : kit::BarButtonItems{});
+}
+
+void PreviewBaseViewController::showRightBarButtonItems(kit::BarButtonItems items)
+{
+    navigationItem().setRightItems(std::move(items));
 }
 
 void PreviewBaseViewController::openInDefaultApp()

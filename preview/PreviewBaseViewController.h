@@ -73,6 +73,13 @@ public:
     void showDocumentActivities(const Button& sender);
     void showMoveTarget(const Button& sender);
 
+protected:
+    /// Shows the right items of the navigation bar.
+    virtual void showRightBarButtonItems(kit::BarButtonItems items);
+    /// Answers how high the content shall be when the bars leave `available` for it; points. Higher content
+    /// scrolls.
+    virtual double contentHeight(double available) const { return available; }
+
 private:
     using Constraint = std::shared_ptr<kit::LayoutConstraint>;
 

@@ -1,52 +1,189 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
+// This file makes the screen and brings it up to date. Its layout, the renaming and the keyboard have sources
+// of their own.
+
 #include "preview/PreviewDetailsViewController.h"
 
+#include "drawing/PieProgressIndicatorView.h"
+#include "drawing/ThumbnailImageView.h"
 #include "items/DRItem.h"
+#include "items/LaunchUtils.h"
+#include "kit/controllers/NavigationItem.h"
+#include "kit/values/Screen.h"
+#include "kit/views/Button.h"
+#include "kit/views/ScrollView.h"
+#include "kit/views/TapRecognizer.h"
+#include "kit/views/TextField.h"
+#include "platform/CloudDocumentService.h"
+#include "platform/Localization.h"
+#include "platform/Log.h"
 #include "platform/Services.h"
-#include "platform/TypeRegistry.h"
+#include "platform/Weakly.h"
+#include "preview/FileInfoStackView.h"
 #include "preview/PreviewItemManager.h"
-#include "screens/PlaceholderView.h"
+#include "prompts/TagEditing.h"
+#include "prompts/UIUtils.h"
 
 namespace tarrow {
 
-using screens::PlaceholderView;
+using kit::InterfaceOrientation;
+using platform::localized;
+using platform::services;
+using platform::weakly;
+using platform::weaklyOr;
 
-namespace {
-
-constexpr const char* folderIcon = "folder";
-
-PlaceholderView::Content summaryOf(const DRItem& item)
+std::shared_ptr<PreviewDetailsViewController> PreviewDetailsViewController::self()
 {
-    auto message = item.localizedTypeDescription();
-    if (const auto size = item.friendlyFileSize(); !size.empty())
-        message += (message.empty() ? "" : "\n") + size;
-    return {.iconName = item.isDirectory()
-            ? folderIcon
-            : platform::services().typeRegistry().iconName(item.typeIdentifier()),
-        .title = item.localizedName(),
-        .message = std::move(message)};
+    return std::static_pointer_cast<PreviewDetailsViewController>(shared_from_this());
 }
 
-} // namespace
+std::shared_ptr<DRItem> PreviewDetailsViewController::item() const
+{
+    const auto manager = itemManager();
+    return manager ? manager->item() : nullptr;
+}
 
 void PreviewDetailsViewController::viewDidLoad()
 {
     PreviewBaseViewController::viewDidLoad();
-    _summaryView = PlaceholderView::create();
-    _summaryView->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
-    _summaryView->setFrame(wrapperView()->bounds());
-    wrapperView()->addSubview(_summaryView);
+    makeOpenInAppButton();
+    setupViewsAndConstraints();
+    offerMenu();
+    view()->addGestureRecognizer(std::make_shared<kit::TapRecognizer>(
+        weakly(this, [](PreviewDetailsViewController& self) { self.viewWasTapped(); })));
+    registerForKeyboardNotifications();
+    _onDownloads = services().notificationCenter().observe(platform::Notification::DownloadsDidChange,
+        weakly(this, [](PreviewDetailsViewController& self) { self.showDownload(); }));
 }
 
+void PreviewDetailsViewController::viewWillAppear(bool animated)
+{
+    // A swipe back that was taken back shows the screen again.
+    registerForKeyboardNotifications();
+    // The window may have been turned while another screen lay over this one.
+    adjustViewsForOrientation(currentPseudoOrientation());
+    PreviewBaseViewController::viewWillAppear(animated);
+}
+
+/// A name that is still being typed is dropped, because it then is the name that counts as unchanged.
+void PreviewDetailsViewController::viewWillDisappear(bool animated)
+{
+    _originalFilename = _filenameTextField->text();
+    unregisterForKeyboardNotifications();
+    PreviewBaseViewController::viewWillDisappear(animated);
+}
+
+void PreviewDetailsViewController::viewWillTransitionToSizeWithTransitionCoordinator(
+    platform::Size size, kit::TransitionCoordinator& coordinator)
+{
+    PreviewBaseViewController::viewWillTransitionToSizeWithTransitionCoordinator(size, coordinator);
+    _fileDetailsView->invalidateIntrinsicContentSize();
+    const auto orientation =
+        size.width > size.height ? InterfaceOrientation::LandscapeLeft : InterfaceOrientation::Portrait;
+    adjustViewsForOrientation(static_cast<int>(orientation));
+    configureMargins();
+    refreshItem();
+}
+
+void PreviewDetailsViewController::traitsDidChange(const kit::TraitCollection& previous)
+{
+    placeOpenInAppButton();
+    PreviewBaseViewController::traitsDidChange(previous);
+}
+
+void PreviewDetailsViewController::makeOpenInAppButton()
+{
+    const auto shown = item();
+    const auto name =
+        shown ? LaunchUtils::defaultAppNameForDocumentRequireOpenIn(shown->url(), true) : std::nullopt;
+    if (!name)
+        return;
+    _openInAppButton = std::make_shared<kit::Button>(localized("Open in “%@”", {*name}));
+    _openInAppButton->setAction(weakly(this, &PreviewBaseViewController::openInDefaultApp));
+}
+
+bool PreviewDetailsViewController::shouldDisplayOpenInAppButtonInView() const
+{
+    return _openInAppButton && UIUtils::tabulaMode();
+}
+
+std::shared_ptr<kit::Button> PreviewDetailsViewController::openInAppNavControllerButton()
+{
+    return shouldDisplayOpenInAppButtonInView() ? nullptr : _openInAppButton;
+}
+
+/// A name that is being typed or given is left alone, because the item may be read again at any time.
 void PreviewDetailsViewController::refreshItem()
 {
     PreviewBaseViewController::refreshItem();
-    const auto manager = itemManager();
-    const auto item = manager ? manager->item() : nullptr;
-    if (_summaryView)
-        _summaryView->setContent(item ? summaryOf(*item) : PlaceholderView::Content());
+    const auto shown = item();
+    _fileInfoView->setItem(shown);
+    _thumbnailView->setItem(shown);
+    if (!_filenameTextField->isEditing()) {
+        _originalFilename = shown ? shown->localizedName() : std::string();
+        _filenameTextField->setText(_originalFilename);
+        _filenameTextField->setPlaceholder({});
+    }
+    showDownload();
+}
+
+void PreviewDetailsViewController::offerMenu()
+{
+    navigationItem().setMenu(
+        localized("More"), weaklyOr(kit::Menu(), this, &PreviewDetailsViewController::menu));
+}
+
+kit::Menu PreviewDetailsViewController::menu()
+{
+    return {{.title = localized("Tags…"),
+        .handler = weakly(this, &PreviewDetailsViewController::editTags),
+        .image = {}}};
+}
+
+void PreviewDetailsViewController::editTags()
+{
+    static constexpr platform::Operation op{"-[PreviewDetailsViewController editTags]"};
+    op.userAction("Edit Tags (details)");
+    const auto shown = item();
+    // The stack outlives the screen, which a new name replaces.
+    if (const auto navigation = navigationController(); navigation && shown)
+        TagEditing::begin({shown->url()}, navigation);
+}
+
+PreviewDetailsViewController::Progress PreviewDetailsViewController::progress() const
+{
+    const auto& field = *_filenameTextField;
+    const bool isTyped = field.isEditing() && field.text() != _originalFilename;
+    return {scrollView()->contentOffset(), isTyped ? std::optional(field.text()) : std::nullopt,
+        field.selectedRange()};
+}
+
+void PreviewDetailsViewController::continueAt(const Progress& progress)
+{
+    view();
+    scrollView()->setContentOffset(progress.scrolledTo);
+    if (!progress.typedName || !_filenameTextField->becomeFirstResponder())
+        return;
+    _filenameTextField->setText(*progress.typedName);
+    _filenameTextField->setSelectedRange(progress.selection);
+}
+
+void PreviewDetailsViewController::showDownload()
+{
+    const auto shown = item();
+    const auto progress = shown && !shown->isDownloaded()
+        ? services().cloudDocumentService().items().downloadProgress(shown->url())
+        : std::nullopt;
+    _downloadView->setHidden(!progress);
+    if (!progress)
+        return;
+    const double share = progress->total && *progress->total > 0
+        ? static_cast<double>(progress->done) / static_cast<double>(*progress->total)
+        : 0;
+    _downloadView->setProgress(static_cast<float>(share));
+    _downloadView->setAccessibilityLabel(localized("Downloading…"));
 }
 
 } // namespace tarrow

@@ -136,24 +136,25 @@ void PreviewItemManager::refreshItem(const Url& url)
     if (isElsewhere)
         op.error("UNEXPECTED: path changed but we only got a presentedItemDidChange: %@ to %@", oldPath,
             fresh->url().path());
-    const bool wasDownloaded = old && old->isDownloaded();
     const auto& date = fresh->contentModificationDate();
     op.debug("%@: modDate %{public}@ vs %{public}@", fresh->url(), _modifiedDate, date);
     const bool isNewer = _modifiedDate && date && *_modifiedDate < *date;
     _modifiedDate = date;
     setItemUpdatePreview(fresh, isElsewhere);
     op.info("Refreshing %@", itemURL());
-    refreshScreens(*fresh, isElsewhere, isNewer, wasDownloaded);
+    refreshScreens(old, *fresh, isNewer);
 }
 
 void PreviewItemManager::refreshScreens(
-    const DRItem& item, bool isElsewhere, bool isNewer, bool wasDownloaded)
+    const std::shared_ptr<DRItem>& before, const DRItem& item, bool isNewer)
 {
     const auto preview = LookwellItemController::defaultController();
     preview->setTitle(screens::displayName(item.localizedName()));
     if (preview->isVisible() && isNewer)
         reloadPreview();
-    if (_detailsViewController && (isElsewhere || isNewer || (!wasDownloaded && item.isDownloaded())))
+    const bool isOther = !before || before->url().path() != item.url().path()
+        || (!before->isDownloaded() && item.isDownloaded()) || before->tags() != item.tags();
+    if (_detailsViewController && (isOther || isNewer))
         _detailsViewController->refreshItem();
 }
 
@@ -187,8 +188,14 @@ void PreviewItemManager::followTo(const Url& url)
         return;
     }
     const auto before = itemURL();
+    const auto progress =
+        _detailsViewController ? std::optional(_detailsViewController->progress()) : std::nullopt;
     const auto window = navigation ? navigation->window() : nullptr;
-    if (warpToNewURL(url) && window && before)
+    if (!warpToNewURL(url))
+        return;
+    if (progress && _detailsViewController)
+        _detailsViewController->continueAt(*progress);
+    if (window && before)
         window->showNotice(movedNotice(*before, url));
 }
 

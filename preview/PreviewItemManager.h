@@ -144,7 +144,7 @@ private:
     void lookAgain();
     void refreshAfterSubitemDeletion();
     void clearRefreshPending();
-    void refreshScreens(const DRItem& item, bool isElsewhere, bool isNewer, bool wasDownloaded);
+    void refreshScreens(const std::shared_ptr<DRItem>& before, const DRItem& item, bool isNewer);
     void removeItem(const Screen& screen, const AccountSession& asked);
 
     int _mode = PreviewModeQuick;

@@ -18,9 +18,10 @@ using testing::ElementsAre;
 
 namespace {
 
-constexpr kit::TraitCollection phone{kit::SizeClass::Compact, kit::SizeClass::Regular};
-constexpr kit::TraitCollection lying{kit::SizeClass::Compact, kit::SizeClass::Compact};
-constexpr kit::TraitCollection tablet{kit::SizeClass::Regular, kit::SizeClass::Regular};
+using testing_support::lying;
+using testing_support::phone;
+using testing_support::symbols;
+using testing_support::tablet;
 
 /// A screen with a button that opens the item in another app.
 class ScreenWithButton : public PreviewBaseViewController {
@@ -32,14 +33,12 @@ public:
 class Base : public testing_support::PreviewFixture {
 protected:
     Base() { resize({360, 640}, phone); }
-    ~Base() override { kit::Screen::setMain(std::nullopt); }
 
     void resize(Size size, const kit::TraitCollection& traits,
         kit::UserInterfaceIdiom idiom = kit::UserInterfaceIdiom::Phone)
     {
-        kit::Screen::setMain(kit::Screen{{0, 0, size.width, size.height}, 1, idiom, {0, 0, size.width, 20}});
-        window->resized(size, traits);
-        window->layoutIfNeeded();
+        constexpr double statusBar = 20;
+        PreviewFixture::resize(size, traits, idiom, statusBar);
     }
     std::shared_ptr<ScreenWithButton> show(const std::shared_ptr<DRItem>& item)
     {
@@ -49,13 +48,6 @@ protected:
         navigation->pushViewController(screen, false);
         window->layoutIfNeeded();
         return screen;
-    }
-    static std::vector<SystemItem> symbols(const kit::BarButtonItems& items)
-    {
-        std::vector<SystemItem> found;
-        for (const auto& item : items)
-            found.push_back(item->systemItem());
-        return found;
     }
 };
 

@@ -4,8 +4,10 @@
 #pragma once
 
 #include "items/DRItem.h"
+#include "kit/controllers/BarButtonItem.h"
 #include "kit/controllers/NavigationController.h"
 #include "kit/controllers/Window.h"
+#include "kit/values/Screen.h"
 #include "preview/LookwellItemController.h"
 #include "preview/PreviewDetailsViewController.h"
 #include "preview/PreviewItemManager.h"
@@ -13,6 +15,19 @@
 #include "tests/screens/support/ScreensFixture.h"
 
 namespace testing_support {
+
+inline constexpr kit::TraitCollection phone{kit::SizeClass::Compact, kit::SizeClass::Regular};
+inline constexpr kit::TraitCollection lying{kit::SizeClass::Compact, kit::SizeClass::Compact};
+inline constexpr kit::TraitCollection tablet{kit::SizeClass::Regular, kit::SizeClass::Regular};
+
+/// Answers the symbols of a bar's items.
+inline std::vector<kit::SystemItem> symbols(const kit::BarButtonItems& items)
+{
+    std::vector<kit::SystemItem> found;
+    for (const auto& item : items)
+        found.push_back(item->systemItem());
+    return found;
+}
 
 /// A manager over a stack in a window of a phone's size, with one screen below.
 class PreviewFixture : public ScreensFixture {
@@ -27,6 +42,17 @@ protected:
     {
         tarrow::LookwellItemController::defaultController()->lookwellNewItem(nullptr);
         manager = nullptr;
+        kit::Screen::setMain(std::nullopt);
+    }
+    /// Gives the window another size, on a screen with a status bar that is so high.
+    void resize(platform::Size size, const kit::TraitCollection& traits,
+        kit::UserInterfaceIdiom idiom = kit::UserInterfaceIdiom::Phone, double statusBar = 0)
+    {
+        kit::Screen::setMain(
+            kit::Screen{{0, 0, size.width, size.height}, 1, idiom, {0, 0, size.width, statusBar}});
+        window->resized(size, traits);
+        drive.dispatch->runUntilIdle();
+        window->layoutIfNeeded();
     }
     std::shared_ptr<tarrow::DRItem> document(const char* name)
     {

@@ -3,7 +3,9 @@
 
 #include "PreviewFixture.h"
 #include "items/FileUtils.h"
+#include "kit/views/Label.h"
 #include "platform/ActivityHandOver.h"
+#include "preview/FileInfoStackView.h"
 #include "screens/PlaceholderView.h"
 #include "screens/preview/PreviewContent.h"
 
@@ -111,11 +113,14 @@ TEST_F(Presenter, BringsTheDetailsUpToDate)
     EXPECT_THAT(stack(), ElementsAre("-", "i"));
     const auto details = manager->detailsViewController();
     ASSERT_TRUE(details);
-    const auto before = details->summaryView()->content();
-    EXPECT_EQ(before.title, "Notes.txt");
+    const auto size = [&] {
+        const auto& rows = details->fileInfoView()->arrangedSubviews();
+        return std::static_pointer_cast<FileInfoCell>(rows.at(1))->valueLabel()->text();
+    };
+    const auto before = size();
     save(url, std::string(5000, 'x'), 10);
     drive.dispatch->advance(1.1);
-    EXPECT_NE(details->summaryView()->content(), before);
+    EXPECT_NE(size(), before);
 
     manager->previewItem(DRItem::initWithURL(url));
     EXPECT_NE(manager->detailsViewController(), details) << "each preview has a screen of its own";
