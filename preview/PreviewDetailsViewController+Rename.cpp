@@ -141,6 +141,7 @@ bool PreviewDetailsViewController::textFieldShouldEndEditing(TextField& field)
 
 void PreviewDetailsViewController::rename(const platform::Url& url, const std::string& name)
 {
+    _givenName = UIUtils::computeNewURLNewBasename(url, name).lastPathComponent();
     _renaming = UIUtils::renameItemAtURLToNameCompletion(
         url, name, weakly(this, &PreviewDetailsViewController::renameEnded, name));
 }

@@ -157,14 +157,16 @@ PreviewDetailsViewController::Progress PreviewDetailsViewController::progress() 
     const auto& field = *_filenameTextField;
     const bool isTyped = field.isEditing() && field.text() != _originalFilename;
     return {scrollView()->contentOffset(), isTyped ? std::optional(field.text()) : std::nullopt,
-        field.selectedRange()};
+        field.selectedRange(), _givenName};
 }
 
 void PreviewDetailsViewController::continueAt(const Progress& progress)
 {
     view();
     scrollView()->setContentOffset(progress.scrolledTo);
-    if (!progress.typedName || !_filenameTextField->becomeFirstResponder())
+    // The notice of the item's new place may come before the answer to the renaming that was begun here.
+    const bool isStillTyped = progress.typedName && *progress.typedName != _originalFilename;
+    if (!isStillTyped || !_filenameTextField->becomeFirstResponder())
         return;
     _filenameTextField->setText(*progress.typedName);
     _filenameTextField->setSelectedRange(progress.selection);

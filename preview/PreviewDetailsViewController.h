@@ -78,6 +78,7 @@ public:
         platform::Point scrolledTo;
         std::optional<std::string> typedName; ///< a name that is being typed and was not given to the item
         kit::TextRange selection; ///< in the typed name
+        std::string givenName; ///< the name that was given to the item here last; empty: none
     };
     Progress progress() const;
     /// Goes on where another screen of the same item was. The screen is on the stack already.
@@ -152,6 +153,7 @@ private:
     std::string _originalFilename;
     kit::BarButtonItems _originalRightBarButtonItems;
     std::shared_ptr<ItemChange> _renaming; ///< the change that gives the item its new name; null: none
+    std::string _givenName; ///< see Progress
     bool _barIsForRename = false; ///< the bar shows Cancel and Done
     bool _endsWhenRenamed = false; ///< the user asked for the end of the editing
     std::vector<platform::Observation> _keyboardObservations;

@@ -195,7 +195,9 @@ void PreviewItemManager::followTo(const Url& url)
         return;
     if (progress && _detailsViewController)
         _detailsViewController->continueAt(*progress);
-    if (window && before)
+    // Who gave the name here needs no words about it.
+    const bool isKnown = progress && progress->givenName == url.lastPathComponent();
+    if (window && before && !isKnown)
         window->showNotice(movedNotice(*before, url));
 }
 

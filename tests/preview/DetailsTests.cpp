@@ -224,6 +224,17 @@ TEST_F(Details, WhileTheNameIsGivenTheFieldCanBeTypedIn)
     EXPECT_TRUE(now->isEditing());
 }
 
+TEST_F(Details, ANewScreenOfTheItemGoesOnOnlyWithAnotherName)
+{
+    open("Notes.txt");
+    details->continueAt({.scrolledTo = {}, .typedName = "Notes.txt", .selection = {}, .givenName = {}});
+    EXPECT_FALSE(field->isEditing()) << "the name was given already, and its notice came first";
+    details->continueAt({.scrolledTo = {}, .typedName = "Plans", .selection = {2, 1}, .givenName = {}});
+    EXPECT_TRUE(field->isEditing());
+    EXPECT_EQ(field->text(), "Plans");
+    EXPECT_EQ(field->selectedRange(), (kit::TextRange{2, 1}));
+}
+
 TEST_F(Details, WhoCancelsWhileTheNameIsGivenSeesTheRealName)
 {
     open("Notes.txt");
