@@ -125,7 +125,10 @@ DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale,
         host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination(),
             .root = cloud->layout().documents(),
             .dispatch = set.dispatch});
-    set.launcherShortcuts = std::make_shared<host::gtk::DesktopShortcuts>(cloud->layout().recentDocument());
+    set.launcherShortcuts =
+        std::make_shared<host::gtk::DesktopShortcuts>(host::gtk::DesktopShortcuts::Settings{
+            cloud->layout().recentDocument(), host::gtk::DesktopShortcuts::sharedRecentFiles(),
+            set.dispatch->makeSerialQueue("TarrowDriveAppID.launcher")});
     set.storageOfferManager = cloud->storageOffers();
     set.keyValueStore = cloud->keyValueStore();
     set.userDefaults =

@@ -5,8 +5,10 @@
 #include "host/gtk/app/DesktopShortcuts.h"
 #include "host/gtk/app/StateFile.h"
 #include "platform/Services.h"
+#include "tests/support/DriveFixture.h"
 #include "tests/support/PlainTexts.h"
 #include "tests/support/TemporaryDirectory.h"
+#include "tests/support/VirtualDispatch.h"
 
 #include <gmock/gmock.h>
 #include <gtk/gtk.h>
@@ -79,19 +81,36 @@ TEST(DesktopShortcutsTests, KeepsTheRecentDocumentForTheNextRunAndNamesItToTheDe
 {
     using platform::ShortcutItem;
     const testing_support::TemporaryDirectory folder;
-    const auto path = folder.at("state/recent-document.json");
-    const auto document = platform::Url::fileURL(folder.write("50% \u00fcber alles.txt", "text"));
+    const auto dispatch = testing_support::VirtualDispatch::create();
+    const auto queue = dispatch->makeSerialQueue("launcher");
+    const auto list = folder.at("recently-used.xbel");
+    const auto shortcuts = [&] {
+        return host::gtk::DesktopShortcuts({folder.at("state/recent-document.json"), list, queue});
+    };
+    const auto document = platform::Url::fileURL(folder.write("50% über alles.txt", "text"));
     const ShortcutItem shortcut{
         std::string(platform::ShortcutTypeRecentDocument), {{"RecentDocumentDocID", std::uint64_t{77}}}};
-    host::gtk::DesktopShortcuts(path).keepRecentDocument(document, shortcut);
-    const auto kept = host::gtk::DesktopShortcuts(path).recentDocument();
+    for (const auto& opened : {document, platform::Url::fileURL(folder.at("other.txt"))}) {
+        shortcuts().keepRecentDocument(opened, shortcut);
+        dispatch->runUntilIdle();
+    }
+    const auto kept = shortcuts().recentDocument();
     ASSERT_TRUE(kept);
     EXPECT_EQ(kept->type, shortcut.type);
     EXPECT_EQ(kept->userInfo, shortcut.userInfo);
-    EXPECT_TRUE(
-        gtk_recent_manager_has_item(gtk_recent_manager_get_default(), document.absoluteString().c_str()));
-    host::gtk::DesktopShortcuts(path).forgetRecentDocument();
-    EXPECT_EQ(host::gtk::DesktopShortcuts(path).recentDocument(), std::nullopt);
+    const std::unique_ptr<GBookmarkFile, decltype(&g_bookmark_file_free)> bookmarks(
+        g_bookmark_file_new(), g_bookmark_file_free);
+    ASSERT_TRUE(g_bookmark_file_load_from_file(bookmarks.get(), list.c_str(), nullptr));
+    EXPECT_EQ(g_bookmark_file_get_size(bookmarks.get()), 2);
+    EXPECT_TRUE(g_bookmark_file_has_item(bookmarks.get(), document.absoluteString().c_str()));
+
+    folder.write("recently-used.xbel", "another form");
+    auto forgetting = shortcuts();
+    forgetting.keepRecentDocument(document, shortcut);
+    forgetting.forgetRecentDocument();
+    dispatch->runUntilIdle();
+    EXPECT_EQ(shortcuts().recentDocument(), std::nullopt);
+    EXPECT_EQ(testing_support::contentOf(list), "another form") << "it is another program's";
 }
 
 } // namespace

@@ -124,7 +124,7 @@ TEST_F(TagTest, ReachTheItemThatOthersRenameOrReplaceMeanwhile)
             mark(document, itemMark::tags, "Theirs");
         }
         auto tags = before;
-        tags.push_back("Red");
+        tags.emplace_back("Red");
         return tags;
     }));
     EXPECT_EQ(asked, 2);
