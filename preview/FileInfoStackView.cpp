@@ -14,6 +14,7 @@
 #include "platform/Weakly.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace tarrow {
 
@@ -30,30 +31,9 @@ constexpr int locationLines = 4;
 /// A tag's dot is as high as a capital letter and one point apart from the text on either side.
 constexpr double dotMargin = 1;
 
-struct DateTexts {
-    std::string created, modified;
-};
-
-DateTexts datesOf(const DRItem& item, DateStyle style)
-{
-    return {item.friendlyCreationDate(style).value_or(""),
-        item.friendlyContentModificationDate(style).value_or("")};
-}
-
 double widthOf(const std::string& text)
 {
     return kit::TextMeasurer::current().measure(text, FileInfoCell::font(), {0, 1}).width;
-}
-
-/// Answers the fullest dates of which both fit; the shortest when none do.
-DateTexts fittingDates(const DRItem& item, double width)
-{
-    for (const auto style : {DateStyle::Long, DateStyle::Medium}) {
-        auto texts = datesOf(item, style);
-        if (widthOf(texts.created) <= width && widthOf(texts.modified) <= width)
-            return texts;
-    }
-    return datesOf(item, DateStyle::Short);
 }
 
 double valueWidth(const std::shared_ptr<FileInfoCell>& cell)
@@ -62,6 +42,27 @@ double valueWidth(const std::shared_ptr<FileInfoCell>& cell)
 }
 
 } // namespace
+
+struct FileInfoStackView::Dates {
+    std::string created, modified;
+};
+
+FileInfoStackView::Dates FileInfoStackView::datesOf(const DRItem& item, DateStyle style)
+{
+    return {item.friendlyCreationDate(style).value_or(""),
+        item.friendlyContentModificationDate(style).value_or("")};
+}
+
+/// Answers the fullest dates of which both fit; the shortest when none do.
+FileInfoStackView::Dates FileInfoStackView::fittingDates(const DRItem& item, double width)
+{
+    for (const auto style : {DateStyle::Long, DateStyle::Medium}) {
+        auto dates = datesOf(item, style);
+        if (widthOf(dates.created) <= width && widthOf(dates.modified) <= width)
+            return dates;
+    }
+    return datesOf(item, DateStyle::Short);
+}
 
 std::shared_ptr<FileInfoStackView> FileInfoStackView::initWithFrame(const platform::Rect& frame)
 {
@@ -170,14 +171,31 @@ std::optional<kit::AttributedText> FileInfoStackView::buildTagsWithImagesStringF
 void FileInfoStackView::layoutSubviews()
 {
     StackView::layoutSubviews();
-    const double width = std::max(valueWidth(_creationDateCell), valueWidth(_modifiedDateCell));
-    if (!_item || width <= 0)
+    if (!_item)
         return;
-    const auto texts = fittingDates(*_item, width);
-    if (_creationDateCell)
-        _creationDateCell->valueLabel()->setText(texts.created);
-    if (_modifiedDateCell)
-        _modifiedDateCell->valueLabel()->setText(texts.modified);
+    // A row is no wider than its text, so other room is tried with the fullest dates first, in the next pass.
+    const auto parent = superview();
+    const double room = parent ? parent->frame().width : 0;
+    if (std::exchange(_room, room) != room && showDates(datesOf(*_item, DateStyle::Long)))
+        return;
+    const double width = std::max(valueWidth(_creationDateCell), valueWidth(_modifiedDateCell));
+    if (width > 0)
+        showDates(fittingDates(*_item, width));
+}
+
+/// Answers whether a row shows another date now.
+bool FileInfoStackView::showDates(const Dates& dates)
+{
+    bool isOther = false;
+    const auto show = [&](const std::shared_ptr<FileInfoCell>& cell, const std::string& text) {
+        if (!cell || cell->valueLabel()->text() == text)
+            return;
+        cell->valueLabel()->setText(text);
+        isOther = true;
+    };
+    show(_creationDateCell, dates.created);
+    show(_modifiedDateCell, dates.modified);
+    return isOther;
 }
 
 } // namespace tarrow

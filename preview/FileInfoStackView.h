@@ -44,6 +44,10 @@ public:
     void layoutSubviews() override;
 
 private:
+    struct Dates;
+    static Dates datesOf(const DRItem& item, platform::DateStyle style);
+    static Dates fittingDates(const DRItem& item, double width);
+    bool showDates(const Dates& dates);
     void rebuild();
     void removeRows();
     std::shared_ptr<FileInfoCell> addRow(const char* name, const std::string& value, int maxLines = 1);
@@ -55,6 +59,7 @@ private:
     std::shared_ptr<platform::OperationQueue> _queue; ///< finds places; null before the first
     std::optional<platform::Url> _located; ///< the URL whose place is known
     std::string _location;
+    double _room = 0; ///< the width of the superview for which the dates were chosen last; points
 };
 
 } // namespace tarrow
