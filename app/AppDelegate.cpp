@@ -5,6 +5,7 @@
 
 #include "app/SchemeEntry.h"
 #include "browser/NavController.h"
+#include "items/AccountSession.h"
 #include "items/DocumentID.h"
 #include "items/Settings.h"
 #include "items/UrlResolution.h"
@@ -145,7 +146,8 @@ void AppDelegate::dumpWindowInfo() const { }
 
 bool AppDelegate::applicationShouldSaveApplicationState(Application&, platform::StateCoder&)
 {
-    return isSignedIn();
+    // The state is saved whenever the keyboard leaves the window, so the account is not read again.
+    return browser() && AccountSession().isCurrent();
 }
 
 bool AppDelegate::applicationShouldRestoreApplicationState(Application&, platform::StateCoder&)

@@ -162,6 +162,7 @@ int main(int argc, char** argv)
 
     auto application = host::gtk::makeApplication({.version = TRW_VERSION,
         .stateFile = layout.interfaceState(),
+        .dispatch = dispatch,
         .previews = previews,
         .onFirstList = [previews] { previews->whenLoaded([](const auto&) {}); }});
     const int status = application->run(argc, argv, [] { return std::make_shared<tarrow::AppDelegate>(); });

@@ -152,7 +152,7 @@ std::unique_ptr<platform::Application> makeApplication(ApplicationSettings setti
 
 GtkApplicationLoop::GtkApplicationLoop(ApplicationSettings settings)
     : _settings(std::move(settings))
-    , _stateFile(_settings.stateFile)
+    , _stateFile(_settings.stateFile, _settings.dispatch)
 {
 }
 

@@ -9,6 +9,10 @@
 #include <memory>
 #include <string>
 
+namespace platform {
+class Dispatch;
+}
+
 namespace host::gtk {
 
 class PreviewModule;
@@ -17,6 +21,7 @@ struct ApplicationSettings {
     std::string applicationId = "app.tarrow.Drive";
     std::string version;
     std::string stateFile; ///< path of the file that keeps the interface's state
+    std::shared_ptr<platform::Dispatch> dispatch; ///< null: that file is written on the main thread
     std::shared_ptr<PreviewModule> previews;
     /// Called once, when the first list is on the screen and the main loop is idle, to begin work that can
     /// wait.

@@ -3,18 +3,25 @@
 
 #pragma once
 
+#include "platform/Dispatch.h"
 #include "platform/PropertyValue.h"
 
+#include <memory>
 #include <string>
 
 namespace host::gtk {
 
 /// The state of the interface that is kept from run to run: the window's size and the state of its screens.
-/// Main thread only.
+/// Main thread only; the file is written on another thread, and what is not written yet when this ends is
+/// written then.
 class StateFile {
 public:
-    /// Reads the file. The folder of the path is made when it is missing.
-    explicit StateFile(std::string path);
+    /// Reads the file. The folder of the path is made when it is missing. Without a dispatch every change is
+    /// written at once.
+    explicit StateFile(std::string path, const std::shared_ptr<platform::Dispatch>& dispatch = nullptr);
+    ~StateFile();
+    StateFile(const StateFile&) = delete;
+    StateFile& operator=(const StateFile&) = delete;
 
     /// Answers the values that were stored last, or none when the file is missing or damaged.
     const platform::PropertyDictionary& values() const { return _values; }
@@ -23,9 +30,10 @@ public:
     void set(const std::string& key, platform::PropertyValue value);
 
 private:
-    void write() const;
+    class Writer;
 
-    std::string _path;
+    std::shared_ptr<Writer> _writer;
+    std::shared_ptr<platform::Queue> _queue;
     platform::PropertyDictionary _values;
 };
 

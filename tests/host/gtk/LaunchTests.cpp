@@ -77,6 +77,24 @@ TEST(StateFileTests, KeepsWhatWasSetAndSurvivesDamage)
     }
 }
 
+TEST(StateFileTests, IsWrittenLaterAndAtTheLatestAtTheEnd)
+{
+    const testing_support::TemporaryDirectory folder;
+    const auto path = folder.at("interface.json");
+    const auto stored = [&] { return host::gtk::StateFile(path).values(); };
+    const auto dispatch = testing_support::VirtualDispatch::create();
+    {
+        host::gtk::StateFile file(path, dispatch);
+        file.set("width", 1);
+        file.set("width", 2);
+        EXPECT_TRUE(stored().empty()) << "nobody waits for the disk";
+        dispatch->runUntilIdle();
+        EXPECT_EQ(stored(), (platform::PropertyDictionary{{"width", 2}}));
+        file.set("width", 3);
+    }
+    EXPECT_EQ(stored(), (platform::PropertyDictionary{{"width", 3}}));
+}
+
 TEST(DesktopShortcutsTests, KeepsTheRecentDocumentForTheNextRunAndNamesItToTheDesktop)
 {
     using platform::ShortcutItem;
