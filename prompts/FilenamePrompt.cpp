@@ -174,6 +174,8 @@ void FilenamePrompt::waitForAnswer(std::function<void()> withdraw)
     _withdraw = std::move(withdraw);
     updateErrorMessage({});
     _defaultAction->setEnabled(false);
+    // The button loses the keyboard with this, and Escape has to reach the alert.
+    _alert->textFields().front()->becomeFirstResponder();
 }
 
 bool FilenamePrompt::withdraw()
@@ -195,8 +197,6 @@ void FilenamePrompt::answer(bool accepted, const std::string& message)
         _alert->dismissViewController(true);
         return;
     }
-    // The button lost the keyboard when it was disabled.
-    field->becomeFirstResponder();
     folderPromptTextFieldChanged(field.get());
     if (typedName() == _confirmedName)
         updateErrorMessage(message);

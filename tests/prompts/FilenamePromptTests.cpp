@@ -192,7 +192,9 @@ TEST_F(FilenamePromptTest, AnAnswerMayComeLater)
             prompt->waitForAnswer([&] { ++withdrawn; });
             return std::string("it does not count");
         }));
+        field().userLeft(); // for the button, which is disabled then
         EXPECT_FALSE(pressDone());
+        EXPECT_TRUE(field().isEditing());
     };
     for (const bool accepted : {true, false}) {
         begin("Notes.txt");
