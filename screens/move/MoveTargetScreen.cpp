@@ -103,6 +103,22 @@ void MoveTargetScreen::viewDidLoad()
         findTitle();
 }
 
+void MoveTargetScreen::viewDidAppear(bool animated)
+{
+    kit::ViewController::viewDidAppear(animated);
+    _hasTakenKeyboard = false;
+    takeKeyboard();
+}
+
+void MoveTargetScreen::takeKeyboard()
+{
+    if (_hasTakenKeyboard || appearanceState() != kit::AppearanceState::Appeared || !_rows
+        || _rows->ids().empty() || presentedViewController())
+        return;
+    _hasTakenKeyboard = true;
+    _listView->becomeFirstResponder();
+}
+
 void MoveTargetScreen::makeBars()
 {
     const auto picker = _picker.lock();
@@ -144,6 +160,7 @@ void MoveTargetScreen::snapshotArrived(const std::shared_ptr<const FolderSnapsho
     const bool hasFailed = snapshot->stage() == ListingStage::Failed;
     _moveButton->setEnabled(!hasFailed && picker && picker->canChoose(_folder));
     showState(hasFailed ? snapshot->error() : std::nullopt);
+    takeKeyboard();
 }
 
 void MoveTargetScreen::showState(const std::optional<Error>& error)

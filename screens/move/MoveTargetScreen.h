@@ -43,6 +43,7 @@ public:
 
     void loadView() override;
     void viewDidLoad() override;
+    void viewDidAppear(bool animated) override;
     bool backRequested() override;
 
 private:
@@ -54,13 +55,15 @@ private:
     void showState(const std::optional<Error>& error);
     void findRecents();
     void findTitle();
+    /// Takes the keyboard from the list under the picker, as soon as there are rows.
+    void takeKeyboard();
     void showRecents(std::vector<Url> recents);
     void makeFolder(const std::string& name);
     void folderWasMade(const Url& made, const std::optional<Error>& error);
 
     std::weak_ptr<MoveTargetPicker> _picker;
     Url _folder;
-    bool _isTitleKnown = false;
+    bool _isTitleKnown = false, _hasTakenKeyboard = false;
     std::shared_ptr<kit::ListView> _listView;
     std::shared_ptr<PlaceholderView> _placeholder;
     std::shared_ptr<kit::BarButtonItem> _moveButton;

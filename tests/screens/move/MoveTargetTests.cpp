@@ -4,7 +4,9 @@
 #include "tests/screens/support/ScreensFixture.h"
 
 #include "kit/controllers/NavigationItem.h"
+#include "kit/views/ListView.h"
 #include "kit/views/TextField.h"
+#include "kit/views/ViewObserver.h"
 #include "platform/FileSystem.h"
 #include "screens/PlaceholderView.h"
 #include "screens/move/MoveTargetPicker.h"
@@ -77,6 +79,25 @@ TEST_F(MoveTarget, DimsFoldersThatAreToBeMovedAndDoesNotEnterThem)
     EXPECT_EQ(folderOf(*picker), "Trips");
     screen->listView()->activateRow(1);
     EXPECT_EQ(folderOf(*picker), "Spain");
+}
+
+TEST_F(MoveTarget, TakesTheKeyboardFromTheListUnderIt)
+{
+    struct Focus : kit::ViewObserver {
+        void viewDidChange(kit::View&, kit::ViewChanges) override { }
+        void viewWantsFocus(kit::View&, bool focus) override { taken += focus ? 1 : 0; }
+        int taken = 0;
+    };
+    const auto focus = std::make_shared<Focus>();
+    const auto picker = pick({drive.writeDocument("Notes.txt")});
+    const auto screen = load(*picker);
+    screen->listView()->setObserver(focus);
+    screen->beginAppearance(true, false);
+    screen->endAppearance();
+    EXPECT_EQ(focus->taken, 0) << "there is no row yet";
+    load(*picker, {{"Stuff", Kind::Folder}});
+    load(*picker, {{"Other", Kind::Folder}, {"Stuff", Kind::Folder}});
+    EXPECT_EQ(focus->taken, 1);
 }
 
 TEST_F(MoveTarget, LeadsToOtherContainersOnlyWhereTheMoveMay)
