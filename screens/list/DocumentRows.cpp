@@ -160,8 +160,12 @@ kit::RowId DocumentRows::idForExtraItem(const Url& url)
 
 kit::RowId DocumentRows::idFor(const Url& url) const
 {
-    const bool isInFolder = url.deletingLastPathComponent() == _snapshot->folder();
-    return isInFolder ? idOfName(url.lastPathComponent()) : idForExtraItem(url);
+    // The texts are compared, because URLs are costly to make for a thousand items.
+    const std::string_view path = url.path();
+    const auto slash = path.rfind('/');
+    const bool isInFolder =
+        slash != std::string_view::npos && path.substr(0, slash) == _snapshot->folder().path();
+    return isInFolder ? idOfName(path.substr(slash + 1)) : idForExtraItem(url);
 }
 
 std::optional<std::size_t> DocumentRows::rowBeginningWith(std::string_view text, std::size_t from) const
