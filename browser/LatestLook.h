@@ -19,8 +19,9 @@ namespace tarrow {
 /// what they asked for before. Main thread.
 class LatestLook : public std::enable_shared_from_this<LatestLook> {
 public:
-    /// Calls `look` on another thread, and `then` with its answer on the main thread. When another look
-    /// begins first, or forget() is called, `dropped` is called in its place (empty: nothing).
+    /// Calls `look` on another thread, and `then` with its answer on the main thread: before this returns
+    /// when the disk is quick, else later. When another look begins first, or forget() is called, `dropped`
+    /// is called in its place (empty: nothing).
     template <typename Look, typename Then>
     void begin(Look look, Then then, std::function<void()> dropped = {})
     {
