@@ -155,7 +155,7 @@ int main(int argc, char** argv)
     const auto layout = addDriveServices(set, locale, previews);
     // The queues are destroyed last, because other services may still post work to them while they are
     // destroyed.
-    const auto dispatch = set.dispatch;
+    const auto dispatch = std::static_pointer_cast<host::system::GLibDispatch>(set.dispatch);
     platform::installServices(std::move(set));
     kit::ImageContext::install(host::system::openImageContext);
     tarrow::FileUtils::logFileAttributes(executable);
@@ -167,6 +167,8 @@ int main(int argc, char** argv)
         .onFirstList = [previews] { previews->whenLoaded([](const auto&) {}); }});
     const int status = application->run(argc, argv, [] { return std::make_shared<tarrow::AppDelegate>(); });
     application.reset();
+    // The work on other threads asks for services, so it ends before they go.
+    dispatch->stopWorkers();
     platform::installServices({});
     return status;
 }

@@ -119,6 +119,13 @@ GLibDispatch::GLibDispatch()
 
 GLibDispatch::~GLibDispatch() = default;
 
+void GLibDispatch::stopWorkers()
+{
+    _serialPool->stop();
+    for (const auto& pool : _operationPools)
+        pool->stop();
+}
+
 std::shared_ptr<Queue> GLibDispatch::makeSerialQueue(std::string label)
 {
     return std::make_shared<SerialQueue>(_serialPool, std::move(label));

@@ -36,6 +36,9 @@ public:
     /// Serves programs without a window: runs the main queue until `isOver`, which is asked after each piece
     /// of work, answers true. Called on the main thread.
     void runMainQueueUntil(const std::function<bool()>& isOver);
+    /// Ends the work on other threads: drops what has not begun, waits for the rest, and drops what is added
+    /// later. The program calls this before it takes away what the work uses.
+    void stopWorkers();
 
 private:
     std::shared_ptr<MainQueue> _mainQueue;

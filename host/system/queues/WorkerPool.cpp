@@ -73,6 +73,11 @@ WorkerPool::WorkerPool(QualityOfService quality, std::size_t maximumThreads)
 
 WorkerPool::~WorkerPool()
 {
+    stop();
+}
+
+void WorkerPool::stop()
+{
     std::deque<Work> dropped;
     std::vector<std::thread> threads;
     {

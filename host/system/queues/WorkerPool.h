@@ -24,6 +24,8 @@ public:
     WorkerPool& operator=(const WorkerPool&) = delete;
 
     void submit(platform::Work work);
+    /// Ends the pool as its destructor does; what is submitted later is dropped.
+    void stop();
 
 private:
     struct State;

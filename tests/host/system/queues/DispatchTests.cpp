@@ -193,4 +193,25 @@ TEST(GLibDispatch, EndsWhileWorkWaitsEverywhere)
     EXPECT_LE(held.use_count(), 4);
 }
 
+TEST(GLibDispatchTests, EndsTheWorkOfOtherThreads)
+{
+    host::system::GLibDispatch dispatch;
+    const auto queue = dispatch.makeSerialQueue("work");
+    std::promise<void> begun;
+    std::atomic<int> ended = 0;
+    queue->async([&] {
+        begun.set_value();
+        std::this_thread::sleep_for(20ms);
+        ++ended;
+    });
+    queue->async([&] { ended += 10; });
+    begun.get_future().wait();
+    dispatch.stopWorkers();
+    EXPECT_EQ(ended, 1) << "what had begun was waited for, and nothing else began";
+    queue->async([&] { ended += 100; });
+    dispatch.makeOperationQueue("more", QualityOfService::Utility)->addOperation([&] { ended += 100; });
+    std::this_thread::sleep_for(5ms);
+    EXPECT_EQ(ended, 1);
+}
+
 } // namespace
