@@ -3,10 +3,10 @@
 
 // This library, when preloaded, makes a folder as slow as a disk that is far away or asleep.
 //
-// LD_PRELOAD=libslow_files.so SLOW_FOLDER=/home/mira/drive SLOW_SWITCH=/tmp/slow PROGRAM delays every call for a
-// file below the folder by half a second (SLOW_MS milliseconds) while the file of SLOW_SWITCH exists, and prints
-// a line on standard error for each such call of the main thread. With SLOW_TRACE=1 the line is followed by who
-// called. Beside libloop_gaps.so it shows what of that a person feels.
+// LD_PRELOAD=libslow_files.so SLOW_FOLDER=/home/mira/drive SLOW_SWITCH=/tmp/slow PROGRAM delays every call
+// for a file below the folder by half a second (SLOW_MS milliseconds) while the file of SLOW_SWITCH exists,
+// and prints a line on standard error for each such call of the main thread. With SLOW_TRACE=1 the line is
+// followed by who called. Beside libloop_gaps.so it shows what of that a person feels.
 
 #include <cstdarg>
 #include <cstdio>
@@ -146,15 +146,14 @@ SLOW_AT_PATH(readlink, ssize_t, (const char* path, char* to, size_t size), (path
 SLOW_AT_PATH(readlinkat, ssize_t, (int folder, const char* path, char* to, size_t size),
     (folder, path, to, size), pathAt(folder, path))
 SLOW_AT_PATH(rename, int, (const char* from, const char* to), (from, to), from)
-SLOW_AT_PATH(renameat2, int,
-    (int fromFolder, const char* from, int toFolder, const char* to, unsigned flags),
+SLOW_AT_PATH(renameat2, int, (int fromFolder, const char* from, int toFolder, const char* to, unsigned flags),
     (fromFolder, from, toFolder, to, flags), pathAt(fromFolder, from))
-SLOW_AT_PATH(unlinkat, int, (int folder, const char* path, int flags), (folder, path, flags),
-    pathAt(folder, path))
-SLOW_AT_PATH(mkdirat, int, (int folder, const char* path, mode_t mode), (folder, path, mode),
-    pathAt(folder, path))
-SLOW_AT_PATH(inotify_add_watch, int, (int watcher, const char* path, uint32_t mask), (watcher, path, mask),
-    path)
+SLOW_AT_PATH(
+    unlinkat, int, (int folder, const char* path, int flags), (folder, path, flags), pathAt(folder, path))
+SLOW_AT_PATH(
+    mkdirat, int, (int folder, const char* path, mode_t mode), (folder, path, mode), pathAt(folder, path))
+SLOW_AT_PATH(
+    inotify_add_watch, int, (int watcher, const char* path, uint32_t mask), (watcher, path, mask), path)
 SLOW_AT_PATH(realpath, char*, (const char* path, char* to), (path, to), path)
 
 } // extern "C"

@@ -40,8 +40,8 @@ public:
             [answer, work = std::move(work)](ItemChange& change) { answer->emplace(work(change)); },
             [answer, ended = std::move(ended)] { ended(std::move(**answer)); });
     }
-    ItemChange(const AccountSession& asked, std::vector<Url> items)
-        : _asked(asked)
+    ItemChange(AccountSession asked, std::vector<Url> items)
+        : _asked(std::move(asked))
         , _items(std::move(items))
     {
     }

@@ -88,11 +88,11 @@ public:
     /// Answers the tags that an item shall have in place of these. It is asked again when another program
     /// changes the item in between.
     using TagEdit = std::function<std::vector<std::string>(const std::vector<std::string>& before)>;
-    /// Gives an item other tags, also one that is only promised, and answers those that it had before. Nothing
-    /// is written when the tags stay the same. Errors: FileErrorCode::InvalidName for a tag that cannot be
-    /// kept (see isTag()); FileErrorCode::Unsupported for what can have no tags, such as a link; E2BIG or
-    /// ENOSPC for more tags than an item can have; EBUSY when another program changed the item in each of
-    /// three attempts.
+    /// Gives an item other tags, also one that is only promised, and answers those that it had before.
+    /// Nothing is written when the tags stay the same. Errors: FileErrorCode::InvalidName for a tag that
+    /// cannot be kept (see isTag()); FileErrorCode::Unsupported for what can have no tags, such as a link;
+    /// E2BIG or ENOSPC for more tags than an item can have; EBUSY when another program changed the item in
+    /// each of three attempts.
     virtual Result<std::vector<std::string>> editTags(const std::string& path, const TagEdit& edit) = 0;
 
     /// Makes a document with the tags and the access of another one, `like`, as far as that one is there; the

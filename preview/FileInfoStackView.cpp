@@ -160,8 +160,8 @@ std::optional<kit::AttributedText> FileInfoStackView::buildTagsWithImagesStringF
     const platform::Point dotOrigin{0, metrics.ascender - metrics.capHeight + dotMargin};
     kit::AttributedText text;
     for (const auto& tag : item.tags()) {
-        if (const auto dot =
-                FileTags::blipWithTagImageSizeBlipHeightOffset(tag, imageSize, metrics.capHeight, dotOrigin))
+        if (const auto dot = FileTags::blipWithTagImageSizeBlipHeightOffset(
+                tag, imageSize, static_cast<float>(metrics.capHeight), dotOrigin))
             text.append(*dot, {font, std::nullopt, 0});
         text.append(&tag == &item.tags().back() ? tag : tag + " ", base);
     }

@@ -48,7 +48,8 @@ TagChoices::TagChoices(
         std::ranges::copy_if(
             tags, std::back_inserter(others), [&](const auto& name) { return !contains(names, name); });
     std::ranges::sort(others);
-    others.erase(std::unique(others.begin(), others.end()), others.end());
+    const auto repeated = std::ranges::unique(others);
+    others.erase(repeated.begin(), repeated.end());
     names.insert(names.end(), others.begin(), others.end());
     for (auto& name : names) {
         const auto items = static_cast<std::size_t>(

@@ -25,8 +25,8 @@ class TagEditing : public std::enable_shared_from_this<TagEditing> {
     };
 
 public:
-    /// Reads the items' tags on a queue and shows the prompt. Nothing is shown when the account has changed or
-    /// the screen has gone meanwhile.
+    /// Reads the items' tags on a queue and shows the prompt. Nothing is shown when the account has changed
+    /// or the screen has gone meanwhile.
     static void begin(std::vector<platform::Url> items, const std::shared_ptr<kit::ViewController>& screen);
     TagEditing(Token, std::vector<platform::Url> items, std::weak_ptr<kit::ViewController> screen);
 

@@ -130,7 +130,8 @@ void TextField::setSelectedRange(TextRange range)
     const std::size_t end = length();
     range.location = std::min(range.location, end);
     range.length = std::min(range.length, end - range.location);
-    // The observer is told of an equal range, too, because the native field may be about to select another one.
+    // The observer is told of an equal range, too, because the native field may be about to select another
+    // one.
     _selection = range;
     changed(ViewChange::Selection);
 }
