@@ -3,6 +3,7 @@
 
 #include "host/system/queues/WorkerPool.h"
 
+#include <sched.h>
 #include <sys/resource.h>
 #include <sys/syscall.h>
 #include <unistd.h>
@@ -33,12 +34,17 @@ namespace {
 
 void lowerPriority(QualityOfService quality)
 {
-    if (quality < QualityOfService::Utility)
-        return;
-    // On Linux the niceness of "process" 0 is that of the calling thread alone.
-    setpriority(PRIO_PROCESS, 0, quality == QualityOfService::Background ? 15 : 5);
-    if (quality == QualityOfService::Background) {
-        constexpr int whoIsThread = 1, lowestBestEffort = (2 << 13) | 7;
+    if (quality == QualityOfService::Utility) {
+        // A batch thread never takes the processor from the interface. Its niceness stays, because nobody but
+        // root may take a higher one back: GLib gives the threads of its shared pool the scheduling of the
+        // thread that made the pool, also when a worker needs another of these threads, and warns if it may
+        // not.
+        const sched_param noRealTime{};
+        sched_setscheduler(0, SCHED_BATCH, &noRealTime);
+    } else if (quality == QualityOfService::Background) {
+        // On Linux the niceness of "process" 0 is that of the calling thread alone.
+        constexpr int veryNice = 15, whoIsThread = 1, lowestBestEffort = (2 << 13) | 7;
+        setpriority(PRIO_PROCESS, 0, veryNice);
         syscall(SYS_ioprio_set, whoIsThread, 0, lowestBestEffort);
     }
 }
