@@ -70,6 +70,8 @@ protected:
     /// are moved in it.
     virtual GtkWidget* childContainer() const { return _canvas.get(); }
     virtual platform::Point childOrigin() const;
+    /// Paints what lies over the background, below the subviews and the border.
+    virtual void snapshotDrawing(const kit::View& shown, GtkSnapshot* snapshot);
     /// Copies changes of the model to the widgets.
     virtual void mirror(kit::View& shown, kit::ViewChanges changes);
     void allocateChildren();
@@ -86,7 +88,6 @@ private:
     platform::Size paintedSize(const kit::View& shown) const;
     void snapshotBackground(const kit::View& shown, GtkSnapshot* snapshot, const GskRoundedRect& shape);
     void snapshotBorder(const kit::View& shown, GtkSnapshot* snapshot, const GskRoundedRect& shape);
-    void snapshotDrawing(const kit::View& shown, GtkSnapshot* snapshot);
 
     std::shared_ptr<PeerContext> _context;
     std::weak_ptr<kit::View> _view;

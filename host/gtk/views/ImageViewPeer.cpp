@@ -99,9 +99,10 @@ void ImageViewPeer::useMeans(Means means)
     gtk_widget_queue_allocate(widget());
 }
 
-void ImageViewPeer::canvasSnapshot(GtkSnapshot* snapshot)
+/// Hard edges are for enlarged pixels; a picture that is made smaller would lose lines.
+void ImageViewPeer::snapshotDrawing(const kit::View& shown, GtkSnapshot* snapshot)
 {
-    ViewPeer::canvasSnapshot(snapshot);
+    ViewPeer::snapshotDrawing(shown, snapshot);
     const auto imageView = _imageView.lock();
     if (_means != Means::Drawing || !imageView || !imageView->image())
         return;
@@ -109,7 +110,11 @@ void ImageViewPeer::canvasSnapshot(GtkSnapshot* snapshot)
     graphene_rect_t bounds;
     graphene_rect_init(&bounds, 0, 0, static_cast<float>(width), static_cast<float>(height));
     auto* cairo = gtk_snapshot_append_cairo(snapshot, &bounds);
-    ImagePaint::draw(cairo, *imageView->image(), placed(*imageView, width, height), CAIRO_FILTER_NEAREST);
+    const auto place = placed(*imageView, width, height);
+    const bool isEnlarged =
+        place.width * gtk_widget_get_scale_factor(widget()) > imageView->image()->pixelWidth();
+    ImagePaint::draw(
+        cairo, *imageView->image(), place, isEnlarged ? CAIRO_FILTER_NEAREST : CAIRO_FILTER_GOOD);
     cairo_destroy(cairo);
 }
 

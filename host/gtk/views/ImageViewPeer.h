@@ -17,9 +17,8 @@ class ImageViewPeer : public ViewPeer {
 public:
     ImageViewPeer(std::shared_ptr<PeerContext> context, const std::shared_ptr<kit::ImageView>& imageView);
 
-    void canvasSnapshot(GtkSnapshot* snapshot) override;
-
 protected:
+    void snapshotDrawing(const kit::View& shown, GtkSnapshot* snapshot) override;
     void mirror(kit::View& shown, kit::ViewChanges changes) override;
 
 private:
