@@ -1,9 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// This file creates folders and moves, renames and deletes items, and asks the user before.
+// This file creates folders, moves and renames items and changes their tags, and asks the user before.
 
-#include "browser/ItemDeletion.h"
 #include "browser/NavController.h"
 #include "browser/RunningChanges.h"
 #include "items/DRItem.h"
@@ -40,13 +39,7 @@ std::int64_t count(const auto& items)
     return static_cast<std::int64_t>(items.size());
 }
 
-void call(const NavController::Completion& completion)
-{
-    if (completion)
-        completion();
-}
-
-/// What became of a new folder and of the items that were to move into it.
+/// The outcome of making a folder and of moving items into it.
 struct FolderOutcome {
     std::optional<Error> refused; ///< the folder was not made
     std::vector<Error> left; ///< items could not be moved
@@ -87,6 +80,12 @@ bool isOnScreen(const FilenamePrompt& prompt)
 
 } // namespace
 
+void NavController::call(const Completion& completion)
+{
+    if (completion)
+        completion();
+}
+
 void NavController::documentListControllerPerformActionURL(const List& list, int action, const Url& url)
 {
     documentListControllerPerformActionURLOriginatingViewCompletion(list, action, url, view(), [] {});
@@ -125,7 +124,7 @@ void NavController::documentListControllerPerformActionURLOriginatingViewComplet
     case DocumentListAction::Move:
         op.userAction("DLC Action Move");
         op.info("Move action: %@", url);
-        // What a search found lies in another folder than the list's.
+        // A search finds items of other folders than the list's.
         askForTarget({url},
             list && !isSearchPresented() ? list->presentedURL() : url.deletingLastPathComponent(),
             completion);
@@ -418,92 +417,6 @@ void NavController::renameConfirmed(const Url& url, const std::string& name, con
     const auto change = UIUtils::renameItemAtURLToNameCompletion(url, name, weakly(this, renamed), asked);
     changeBegun(change);
     _folderPromptAlert->waitForAnswer([change] { change->cancel(); });
-}
-
-void NavController::showWarningAndDeleteDocument(const Sender&)
-{
-    static constexpr Operation op{"-[NavController showWarningAndDeleteDocument:]"};
-    const auto list = getTopDocumentListController();
-    if (!list)
-        return;
-    const auto items = list->selectedItems();
-    op.userAction("Pressed Delete (nav)");
-    op.info("Pressed Delete after selecting %{public}@ items: %@", items.size(), items);
-    showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(items, nullptr, list, {});
-}
-
-void NavController::showWarningAndDeleteURLsUsingViewWithDocumentListControllerFinishedCompletion(
-    const std::vector<Url>& urls, const std::shared_ptr<kit::View>& view, const List& list,
-    const Completion& finished)
-{
-    static constexpr Operation op{
-        "-[NavController showWarningAndDeleteURLs:usingView:withDocumentListController:finishedCompletion:]"};
-    const auto libraries = MenuEnableChecks::numContainersInURLArray(urls);
-    if (libraries != 0 && libraries != urls.size()) {
-        op.error("Not Deleting: mix of containers and items: %@", urls);
-        call(finished);
-        return;
-    }
-    struct Facts {
-        bool holdsSpecialFolder;
-        std::optional<std::string> message;
-    };
-    const auto look = [urls] {
-        const bool holdsSpecialFolder = MenuEnableChecks::isDesktopOrDocumentsInURLArray(urls);
-        const bool asks = !holdsSpecialFolder && !urls.empty();
-        return Facts{holdsSpecialFolder, asks ? UIUtils::messageForDeletePrompt(urls) : std::nullopt};
-    };
-    lookThen(
-        look,
-        [urls, view, list, finished](NavController& self, const Facts& facts) {
-            if (!facts.holdsSpecialFolder)
-                return self.askBeforeDeletion(facts.message, urls, view, list, finished);
-            op.warning("Not deleting special folder: %@", urls);
-            call(finished);
-            UIUtils::showUnsupportedError(self.visibleViewController());
-        },
-        finished);
-}
-
-void NavController::askBeforeDeletion(const std::optional<std::string>& message, const std::vector<Url>& urls,
-    const std::shared_ptr<kit::View>& view, const List& list, const Completion& finished)
-{
-    static constexpr Operation op{
-        "-[NavController showWarningAndDeleteURLs:usingView:withDocumentListController:finishedCompletion:]"};
-    UIUtils::showDeleteWarningAlertMessageViewControllerUsingViewUsingButtonCompletion(message,
-        visibleViewController(), view, _barButtonDeleteItem,
-        [browser = self(), urls, list, finished, asked = AccountSession()](const auto&, bool cancelled) {
-            op.userAction(cancelled ? "Delete was Cancelled (nav)" : "Delete was Confirmed (nav)");
-            const bool isConfirmed = !cancelled && asked.isCurrent();
-            if (isConfirmed && list)
-                browser->setEditModeAndUpdateUIForViewController(false, list);
-            if (isConfirmed)
-                browser->deleteConfirmed(urls, finished, asked);
-            else
-                call(finished);
-        });
-}
-
-void NavController::deleteConfirmed(
-    const std::vector<Url>& urls, const Completion& finished, const AccountSession& asked)
-{
-    const auto showFailures = [asked](NavController& self, const DeletionOutcome& outcome) {
-        self.changeEnded();
-        if (!asked.isCurrent())
-            return;
-        const auto failures = static_cast<std::int64_t>(outcome.failures);
-        if (failures == 1)
-            UIUtils::showErrorParentViewController(outcome.lastError, self.topViewController());
-        else if (failures > 1)
-            UIUtils::showAlertMessageParentViewController(
-                localizedPlural(".DICT.CANNOT_DELETE_ITEMS.%d", {failures}), {}, self.topViewController());
-    };
-    const auto change = ItemChange::begin(asked, urls, deleteItems,
-        [finished, show = weakly(this, showFailures)](const DeletionOutcome& outcome) {
-            call(finished);
-            show(outcome);
-        });
-    changeBegun(change);
 }
 
 void NavController::showDICUrlCompletion(

@@ -52,7 +52,7 @@ std::string described(const std::shared_ptr<DRItem>& item)
 
 } // namespace
 
-/// What is known of an item that was tapped.
+/// The facts about an item that was tapped.
 struct NavController::PickedItem {
     std::shared_ptr<DRItem> item; ///< null: it is gone
     std::shared_ptr<DRItem> target; ///< the item itself, or where a link leads; null: nowhere in the drive

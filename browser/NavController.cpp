@@ -143,7 +143,8 @@ void NavController::didBecomeActiveNotification()
 {
     static constexpr Operation op{"-[NavController didBecomeActiveNotification:]"};
     op.info("Got HostDidActivateEvent (nav)");
-    // What is known already is followed at once, so that a URL that comes next finds its account's drive.
+    // The account that is known already is followed at once, so that a URL that comes next finds its
+    // account's drive.
     if (storedToken() != services().cloudDocumentService().account().knownIdentityToken())
         return handleAccountChanges();
     // The account is read on another thread, because its file may be slow and a window is activated often.

@@ -244,7 +244,8 @@ private:
     /// something else since or has left the screen. `dropped` is called in that case.
     template <typename Look, typename Then>
     void lookThen(Look look, Then then, const Completion& dropped);
-    /// What has to be known before items are moved.
+    static void call(const Completion& completion);
+    /// The facts that the program needs before it moves items.
     struct MoveFacts {
         bool holdsSpecialFolder = false, mayLeaveContainer = false, hasOtherFolder = true;
         std::shared_ptr<const screens::DrivePlaces> places{};

@@ -27,8 +27,8 @@ inline constexpr std::string_view plusDarker = "plusDarker";
 
 } // namespace compositingFilter
 
-/// What the program adds to the platform's colours: the colour that results where one lies over another.
-/// Nothing is drawn. Any thread.
+/// These functions add to the platform's colours the colour that results where one lies over another. They
+/// draw nothing. Any thread.
 inline namespace TarrowDriveApp_FileTagColors {
 
 /// Answers the base colour with the blend colour over it, under the named filter; without a filter the blend
