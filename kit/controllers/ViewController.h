@@ -100,6 +100,9 @@ public:
     /// Event up: the user asks to go back within this screen. The default presses the Cancel button of the
     /// navigation bar. Answers false when there is nothing to go back to.
     virtual bool backRequested();
+    /// Event up: the user asks by Ctrl+Z to undo the latest change, while no text has the keyboard focus.
+    /// Answers false when there is nothing to undo, as by default.
+    virtual bool undoRequested() { return false; }
 
     const std::string& restorationIdentifier() const
     {

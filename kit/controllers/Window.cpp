@@ -153,6 +153,11 @@ bool Window::backRequested()
     return true;
 }
 
+bool Window::undoRequested()
+{
+    return _root && presentedScreens().empty() && _root->undoRequested();
+}
+
 void Window::closed()
 {
     if (!_visible)

@@ -57,6 +57,8 @@ public:
     /// cancelled; else the Cancel button of the bar is pressed; else the navigation goes back. Answers false
     /// when there is nothing to go back to.
     bool backRequested();
+    /// The user asks to undo the latest change. The root screen is asked, unless another screen lies over it.
+    bool undoRequested();
     /// The window was closed, so its screens disappear.
     void closed();
 

@@ -53,6 +53,7 @@ WindowPeer::WindowPeer(AdwApplication* application, const std::shared_ptr<kit::W
     kit::TextMeasurer::install(_measurer);
     connectWindow();
     connectInput();
+    connectUndo();
 }
 
 WindowPeer::~WindowPeer()
@@ -134,6 +135,22 @@ void WindowPeer::connectInput()
     gtk_widget_add_controller(_window.get(), GTK_EVENT_CONTROLLER(click));
     _connections.push_back(connectSignal<void(int, double, double)>(
         click, "pressed", [this](int, double, double) { goBack(); }));
+}
+
+/// A text that has the keyboard undoes its own edits, and nothing else is undone while there are none.
+void WindowPeer::connectUndo()
+{
+    const auto call = [](GtkWidget*, GVariant*, gpointer data) -> gboolean {
+        auto& self = *static_cast<WindowPeer*>(data);
+        auto* focus = gtk_window_get_focus(self.window());
+        const auto shown = self.model();
+        return shown && !GTK_IS_TEXT(focus) && !GTK_IS_TEXT_VIEW(focus) && shown->undoRequested();
+    };
+    auto* keys = gtk_shortcut_controller_new();
+    gtk_shortcut_controller_add_shortcut(GTK_SHORTCUT_CONTROLLER(keys),
+        gtk_shortcut_new(gtk_keyval_trigger_new(GDK_KEY_z, GDK_CONTROL_MASK),
+            gtk_callback_action_new(call, this, nullptr)));
+    gtk_widget_add_controller(_window.get(), keys);
 }
 
 bool WindowPeer::goBack()
@@ -295,7 +312,12 @@ void WindowPeer::windowShowsNotice(kit::Window&, const std::string& text, const 
     constexpr int lines = 3;
     auto* toast = adw_toast_new("");
     adw_toast_set_custom_title(toast, makeToastTitle(text, lines));
+    // A later message means that an earlier one's button is not about the latest change any more.
+    if (_offer)
+        adw_toast_dismiss(_offer.get());
+    _offer.reset();
     if (!action.title.empty()) {
+        _offer = ObjectRef<AdwToast>::retain(toast);
         adw_toast_set_button_label(toast, action.title.c_str());
         connectForLife<void()>(toast, "button-clicked", action.run);
     }

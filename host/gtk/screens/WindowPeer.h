@@ -74,6 +74,7 @@ private:
     };
     void build(AdwApplication* application, const WindowSize& size);
     void connectInput();
+    void connectUndo();
     void connectWindow();
     void connectSurface();
     void showRoot();
@@ -96,6 +97,7 @@ private:
     std::unique_ptr<SizedBin> _bin;
     KeyboardWatch _keyboard;
     AdwToastOverlay* _toasts = nullptr;
+    ObjectRef<AdwToast> _offer; ///< the latest message with a button
     GtkWidget* _overlay = nullptr;
     std::shared_ptr<ScreenPeer> _root;
     std::vector<Layer> _layers; ///< the topmost last
