@@ -7,7 +7,7 @@
 #include "browser/RunningChanges.h"
 #include "items/DRItem.h"
 #include "items/FileUtils.h"
-#include "items/ItemChange.h"
+#include "items/ItemMoves.h"
 #include "items/MenuEnableChecks.h"
 #include "items/UrlResolution.h"
 #include "kit/controllers/AlertController.h"
@@ -43,6 +43,7 @@ std::int64_t count(const auto& items)
 struct FolderOutcome {
     std::optional<Error> refused; ///< the folder was not made
     std::vector<Error> left; ///< items could not be moved
+    std::optional<UndoEntry> undo;
 };
 
 /// Creates a folder if it does not exist yet, and moves the items of a change into it.
@@ -50,11 +51,12 @@ FolderOutcome makeFolder(const Url& folder, ItemChange& change, const Operation&
 {
     if (FileUtils::exists(folder)) {
         op.info("Item exists at path: %@", folder);
-        return {Error(FileErrorCode::ItemExists), {}};
+        return {Error(FileErrorCode::ItemExists), {}, {}};
     }
     if (auto refused = FileUtils::mkdir(folder, change.stillWanted()))
-        return {std::move(refused), {}};
-    return {std::nullopt, moveItems(change, folder)};
+        return {std::move(refused), {}, {}};
+    auto moved = moveItems(change, folder);
+    return {std::nullopt, std::move(moved.errors), undoOfNewFolder(madeFolder(folder), moved.moved)};
 }
 
 /// Answers a prompt's message about an error. What was taken back needs no words.
@@ -167,7 +169,7 @@ void NavController::editTagsOfItems(const std::vector<Url>& items)
 {
     static constexpr Operation op{"-[NavController editTagsOfItems:]"};
     op.userAction("Edit Tags");
-    TagEditing::begin(items, self());
+    TagEditing::begin(items, self(), _undoHistory);
 }
 
 void NavController::promtForNewFolderAndCreate(const Sender&)
@@ -235,14 +237,19 @@ void NavController::makeFolderForItems(
     static constexpr Operation op{"-[NavController showNewFolderPromptDuringMove:itemsToMove:]"};
     const auto change = ItemChange::begin(
         asked, items, [folder](ItemChange& begun) { return makeFolder(folder, begun, op); },
-        weakly(this, [prompt = _folderPromptAlert](NavController& self, const FolderOutcome& outcome) {
-            self.changeEnded();
-            const auto message = outcome.refused ? messageAbout(outcome.refused) : messageAbout(outcome.left);
-            if (isOnScreen(*prompt))
-                prompt->answer(!outcome.refused && outcome.left.empty(), message);
-            else if (prompt->isWaiting() && !message.empty())
-                UIUtils::showAlertMessageParentViewController(message, {}, self.topViewController());
-        }));
+        weakly(this,
+            [prompt = _folderPromptAlert, expected = UndoHistory::expect(_undoHistory, asked)](
+                NavController& self, const FolderOutcome& outcome) {
+                self.changeEnded();
+                const auto message =
+                    outcome.refused ? messageAbout(outcome.refused) : messageAbout(outcome.left);
+                if (isOnScreen(*prompt))
+                    prompt->answer(!outcome.refused && outcome.left.empty(), message);
+                else if (prompt->isWaiting() && !message.empty())
+                    UIUtils::showAlertMessageParentViewController(message, {}, self.topViewController());
+                if (outcome.undo)
+                    expected->add(*outcome.undo);
+            }));
     changeBegun(change);
     _folderPromptAlert->waitForAnswer([change] { change->cancel(); });
 }
@@ -322,12 +329,19 @@ void NavController::documentTargetSelectionControllerDidSelectItemAtURL(
 
 namespace {
 
-std::vector<Error> moveAll(ItemChange& change, const Url& directory)
+/// What became of moving items.
+struct MovedOutcome {
+    std::vector<Error> errors;
+    std::optional<UndoEntry> undo;
+};
+
+MovedOutcome moveAll(ItemChange& change, const Url& directory)
 {
     static constexpr Operation op{"-[NavController moveItemsToDirectory:toDirectory:]"};
     op.debug("MoveTarget = %@", directory);
     op.debug("ItemsToMove = %@", change.items());
-    return moveItems(change, directory);
+    auto outcome = moveItems(change, directory);
+    return {std::move(outcome.errors), undoOfMoves(outcome.moved)};
 }
 
 } // namespace
@@ -336,7 +350,7 @@ std::vector<Error> NavController::moveItemsToDirectoryToDirectory(
     const std::vector<Url>& items, const Url& directory)
 {
     ItemChange change(AccountSession(), items);
-    return moveAll(change, directory);
+    return moveAll(change, directory).errors;
 }
 
 void NavController::moveItemsToDirectoryAndShowErrorsToDirectory(
@@ -345,17 +359,22 @@ void NavController::moveItemsToDirectoryAndShowErrorsToDirectory(
     const AccountSession asked;
     const auto change = ItemChange::begin(
         asked, items, [directory](ItemChange& begun) { return moveAll(begun, directory); },
-        weakly(this, [asked](NavController& self, const std::vector<Error>& errors) {
-            self.changeEnded();
-            if (!asked.isCurrent())
-                return;
-            const auto top = self.topViewController();
-            if (errors.size() == 1)
-                UIUtils::showFriendlyMoveErrorParentViewController(errors.front(), top);
-            else if (!errors.empty())
-                UIUtils::showAlertMessageParentViewController(
-                    localizedPlural(".DICT.CANNOT_MOVE_ITEMS.%d", {count(errors)}), {}, top);
-        }));
+        weakly(this,
+            [asked, expected = UndoHistory::expect(_undoHistory, asked)](
+                NavController& self, const MovedOutcome& outcome) {
+                self.changeEnded();
+                if (!asked.isCurrent())
+                    return;
+                const auto& errors = outcome.errors;
+                const auto top = self.topViewController();
+                if (errors.size() == 1)
+                    UIUtils::showFriendlyMoveErrorParentViewController(errors.front(), top);
+                else if (!errors.empty())
+                    UIUtils::showAlertMessageParentViewController(
+                        localizedPlural(".DICT.CANNOT_MOVE_ITEMS.%d", {count(errors)}), {}, top);
+                if (outcome.undo)
+                    expected->add(*outcome.undo);
+            }));
     changeBegun(change);
 }
 
@@ -414,7 +433,8 @@ void NavController::renameConfirmed(const Url& url, const std::string& name, con
             UIUtils::showFriendlyRenameErrorBasenameParentViewController(
                 *error, name, self.topViewController());
     };
-    const auto change = UIUtils::renameItemAtURLToNameCompletion(url, name, weakly(this, renamed), asked);
+    const auto change =
+        UIUtils::renameItemAtURLToNameCompletion(url, name, weakly(this, renamed), _undoHistory, asked);
     changeBegun(change);
     _folderPromptAlert->waitForAnswer([change] { change->cancel(); });
 }

@@ -155,6 +155,7 @@ void NavController::replaceItemManager(int mode)
     completeTransition();
     dropItemManager();
     _itemManager = PreviewItemManager::newItemManagerWithModeNavController(mode, self());
+    _itemManager->setUndoHistory(_undoHistory);
 }
 
 void NavController::showPreviewPreviewMode(const std::shared_ptr<DRItem>& item, int mode)
@@ -384,6 +385,7 @@ NavController::Screen NavController::documentListControllerViewControllerForPrev
     if (values && (values->flag(AttributeKey::IsPackage) || values->flag(AttributeKey::IsRegularFile))) {
         completeTransition();
         _itemManager = PreviewItemManager::newItemManagerWithModeNavController(PreviewModeQuick, self());
+        _itemManager->setUndoHistory(_undoHistory);
         _peekManager = _itemManager;
         return _itemManager->prepareToPreviewItem(DRItem::initWithURL(url));
     }

@@ -5,6 +5,7 @@
 
 #include "browser/ListLogging.h"
 #include "items/DRItem.h"
+#include "items/UndoHistory.h"
 #include "kit/views/View.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
@@ -60,6 +61,7 @@ void NavController::viewDidLoad()
 {
     static constexpr Operation op{"-[NavController viewDidLoad]"};
     setDelegate(self());
+    beginUndoHistory();
     observeAccount();
     setupInitialViewController();
     NavigationController::viewDidLoad();
@@ -183,6 +185,7 @@ void NavController::handleAccountChanges()
     op.info("Tarrow Token Changed, enabled=%{public}@, reinitializing view", token ? "YES" : "NO");
     saveTarrowToken(token);
     RecentDocument::forget();
+    _undoHistory->forget();
     endEverythingPresented();
     _editMode = false;
     setupInitialViewController();

@@ -42,6 +42,9 @@ class FilenamePrompt;
 class PreviewItemManager;
 class ItemChange;
 class RunningChanges;
+class UndoHistory;
+struct UndoEntry;
+struct UndoOutcome;
 
 /// The browser: a stack of the drive's folder lists with a preview on top of them, or the screen that says
 /// that the drive is not available. It follows the cloud account and keeps the line under each list up to
@@ -126,6 +129,11 @@ public:
     std::string toolbarStatusText(std::size_t itemCount) const;
     std::string quotaAvailableString() const;
     bool okToShowQuota() const { return _lastQuotaFetch.has_value(); }
+
+    /// The changes that the user can undo.
+    const std::shared_ptr<UndoHistory>& undoHistory() const { return _undoHistory; }
+    /// Undoes the latest change while a list or an item's details are on top.
+    bool undoRequested() override;
 
     // In edit mode the user selects several items with check marks.
     using Sender = std::shared_ptr<kit::BarButtonItem>; ///< the button that was pressed; null: none
@@ -271,6 +279,10 @@ private:
     void deleteConfirmed(
         const std::vector<platform::Url>& urls, const Completion& finished, const AccountSession& asked);
 
+    void beginUndoHistory();
+    void offerUndo(std::uint64_t number, const UndoEntry& entry);
+    void undoEnded(const UndoEntry& entry, const UndoOutcome& outcome);
+
     Sender makeToolbarButton(const std::string& title, void (NavController::*operation)(const Sender&));
     void configureEditToolbar(const List& list);
     void placeBecameKnown(const std::weak_ptr<screens::DocumentListController>& known);
@@ -295,6 +307,7 @@ private:
     std::optional<AccountSession> _moveAsked; ///< who was asked last for the destination of a move
     const std::shared_ptr<LatestLook> _look = std::make_shared<LatestLook>();
     std::shared_ptr<RunningChanges> _runningChanges; ///< null before the first change
+    std::shared_ptr<UndoHistory> _undoHistory;
     std::vector<platform::Observation> _observations;
 };
 

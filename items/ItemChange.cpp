@@ -57,12 +57,4 @@ std::vector<Error> ItemChange::forEachItem(const std::function<std::optional<Err
     return errors;
 }
 
-std::vector<Error> moveItems(ItemChange& change, const Url& folder)
-{
-    return change.forEachItem([&](const Url& item) {
-        return FileUtils::moveTo(
-            item, folder.appendingPathComponent(item.lastPathComponent()), change.stillWanted());
-    });
-}
-
 } // namespace tarrow

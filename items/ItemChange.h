@@ -81,8 +81,4 @@ private:
     std::atomic<bool> _isCancelled = false, _hasEnded = false;
 };
 
-/// Moves the items of a change into a folder, and answers the errors of those that could not be moved. On the
-/// change's queue.
-std::vector<Error> moveItems(ItemChange& change, const Url& folder);
-
 } // namespace tarrow

@@ -53,6 +53,12 @@ std::shared_ptr<PreviewBaseViewController> PreviewBaseViewController::self()
     return std::static_pointer_cast<PreviewBaseViewController>(shared_from_this());
 }
 
+std::shared_ptr<UndoHistory> PreviewBaseViewController::undoHistory() const
+{
+    const auto manager = itemManager();
+    return manager ? manager->undoHistory() : nullptr;
+}
+
 void PreviewBaseViewController::loadView()
 {
     ViewController::loadView();

@@ -19,6 +19,7 @@ class ScrollView;
 namespace tarrow {
 
 class PreviewItemManager;
+class UndoHistory;
 
 /// The common base of the program's own preview screens: content that scrolls between the bars, and buttons
 /// to share, delete and move the item of the manager that made the screen. Main thread only.
@@ -27,6 +28,8 @@ public:
     using Button = std::shared_ptr<kit::BarButtonItem>;
 
     std::shared_ptr<PreviewItemManager> itemManager() const { return _itemManager.lock(); }
+    /// Answers the manager's history, or null.
+    std::shared_ptr<UndoHistory> undoHistory() const;
     void setItemManager(std::weak_ptr<PreviewItemManager> manager) { _itemManager = std::move(manager); }
     int mode() const { return _mode; } ///< the manager's mode
     void setMode(int mode) { _mode = mode; }

@@ -143,7 +143,7 @@ void PreviewDetailsViewController::rename(const platform::Url& url, const std::s
 {
     _givenName = UIUtils::computeNewURLNewBasename(url, name).lastPathComponent();
     _renaming = UIUtils::renameItemAtURLToNameCompletion(
-        url, name, weakly(this, &PreviewDetailsViewController::renameEnded, name));
+        url, name, weakly(this, &PreviewDetailsViewController::renameEnded, name), undoHistory());
 }
 
 /// The field may show another text meanwhile: who cancelled sees the item's real name, and who typed on keeps

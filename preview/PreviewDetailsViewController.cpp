@@ -149,7 +149,7 @@ void PreviewDetailsViewController::editTags()
     const auto shown = item();
     // The stack outlives the screen, which a new name replaces.
     if (const auto navigation = navigationController(); navigation && shown)
-        TagEditing::begin({shown->url()}, navigation);
+        TagEditing::begin({shown->url()}, navigation, undoHistory());
 }
 
 PreviewDetailsViewController::Progress PreviewDetailsViewController::progress() const

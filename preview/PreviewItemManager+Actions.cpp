@@ -5,7 +5,7 @@
 
 #include "items/DRItem.h"
 #include "items/FileUtils.h"
-#include "items/ItemChange.h"
+#include "items/ItemMoves.h"
 #include "items/UrlResolution.h"
 #include "platform/Log.h"
 #include "preview/PreviewItemManager.h"
@@ -105,10 +105,23 @@ void PreviewItemManager::documentTargetSelectionControllerDidSelectItemAtURL(
     const auto asked = _moveAsked.value_or(AccountSession());
     if (!asked.isCurrent())
         return;
+    struct Outcome {
+        std::vector<Error> errors;
+        std::optional<UndoEntry> undo;
+    };
+    if (const auto url = itemURL())
+        _movedTo = folder.appendingPathComponent(url->lastPathComponent());
     ItemChange::begin(
-        asked, picker->itemsToMove(), [folder](ItemChange& change) { return moveItems(change, folder); },
-        [place = ErrorPlace(navigationController(), nullptr)](const std::vector<Error>& errors) {
-            for (const auto& error : errors)
+        asked, picker->itemsToMove(),
+        [folder](ItemChange& change) {
+            auto outcome = moveItems(change, folder);
+            return Outcome{std::move(outcome.errors), undoOfMoves(outcome.moved)};
+        },
+        [place = ErrorPlace(navigationController(), nullptr),
+            expected = UndoHistory::expect(undoHistory(), asked)](const Outcome& outcome) {
+            if (outcome.undo)
+                expected->add(*outcome.undo);
+            for (const auto& error : outcome.errors)
                 UIUtils::showFriendlyMoveErrorParentViewController(error, place.screen());
         });
 }

@@ -4,6 +4,7 @@
 // This file follows the changes that other programs make to the previewed item.
 
 #include "items/DRItem.h"
+#include "items/ItemMoves.h"
 #include "kit/controllers/Window.h"
 #include "platform/CloudDocumentService.h"
 #include "platform/Dispatch.h"
@@ -40,14 +41,6 @@ std::string shownName(const std::optional<Url>& url)
 std::string deletedNotice(const std::optional<Url>& url)
 {
     return localized("“%@” was deleted", {shownName(url)});
-}
-
-std::string movedNotice(const Url& from, const Url& to)
-{
-    const auto folder = to.deletingLastPathComponent();
-    if (folder == from.deletingLastPathComponent())
-        return localized("“%1$@” is now called “%2$@”", {shownName(from), shownName(to)});
-    return localized("“%1$@” was moved to “%2$@”", {shownName(to), screens::folderTitle(folder)});
 }
 
 void reloadPreview()
@@ -195,10 +188,10 @@ void PreviewItemManager::followTo(const Url& url)
         return;
     if (progress && _detailsViewController)
         _detailsViewController->continueAt(*progress);
-    // Who gave the name here needs no words about it.
-    const bool isKnown = progress && progress->givenName == url.lastPathComponent();
+    // Who gave the name or chose the place here needs no words about it.
+    const bool isKnown = (progress && progress->givenName == url.lastPathComponent()) || _movedTo == url;
     if (window && before && !isKnown)
-        window->showNotice(movedNotice(*before, url));
+        window->showNotice(movedSentence(*before, url));
 }
 
 void PreviewItemManager::accommodatePresentedItemDeletionWithCompletionHandler(CompletionHandler completion)

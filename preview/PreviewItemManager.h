@@ -32,6 +32,7 @@ namespace tarrow {
 class DRItem;
 class LookwellItemController;
 class PreviewDetailsViewController;
+class UndoHistory;
 
 /// Coordinates the preview of one document: it chooses the screen and puts it on the browser's stack, follows
 /// the changes of other programs, moves and deletes the document, and offers it to the account's other
@@ -67,6 +68,9 @@ public:
         return _documentInteractionController;
     }
     void setDocumentInteractionController(std::shared_ptr<screens::DocumentInteractionSheet> sheet);
+    /// The history that gets the item's changes; null: none does.
+    std::shared_ptr<UndoHistory> undoHistory() const { return _undoHistory.lock(); }
+    void setUndoHistory(std::weak_ptr<UndoHistory> history) { _undoHistory = std::move(history); }
     /// The queue on which the presenter is called.
     const std::shared_ptr<platform::OperationQueue>& fcQueue() const { return _fcQueue; }
     /// The content's modification date at the last look.
@@ -154,7 +158,9 @@ private:
     std::shared_ptr<screens::DocumentInteractionSheet> _documentInteractionController;
     std::weak_ptr<kit::NavigationController> _navigationController;
     std::vector<platform::Observation> _observations;
+    std::weak_ptr<UndoHistory> _undoHistory;
     std::optional<AccountSession> _moveAsked; ///< who was asked last for the destination of a move
+    std::optional<platform::Url> _movedTo; ///< where the user of this program has moved the item last
 
     mutable std::mutex _mutex; ///< guards the fields below
     std::shared_ptr<DRItem> _item;

@@ -5,31 +5,29 @@
 
 #include "items/DRItem.h"
 #include "items/FileUtils.h"
-#include "items/ItemChange.h"
 #include "kit/controllers/ViewController.h"
-#include "kit/controllers/Window.h"
 #include "platform/Localization.h"
-#include "platform/Weakly.h"
 #include "prompts/TagsPrompt.h"
 #include "prompts/UIUtils.h"
 
 namespace tarrow {
 
 using platform::Error;
-using platform::localized;
 using platform::localizedPlural;
 using platform::Url;
-using platform::weakly;
 
-TagEditing::TagEditing(Token, std::vector<Url> items, std::weak_ptr<kit::ViewController> screen)
+TagEditing::TagEditing(Token, std::vector<Url> items, std::weak_ptr<kit::ViewController> screen,
+    std::weak_ptr<UndoHistory> history)
     : _items(std::move(items))
     , _screen(std::move(screen))
+    , _history(std::move(history))
 {
 }
 
-void TagEditing::begin(std::vector<Url> items, const std::shared_ptr<kit::ViewController>& screen)
+void TagEditing::begin(std::vector<Url> items, const std::shared_ptr<kit::ViewController>& screen,
+    const std::shared_ptr<UndoHistory>& history)
 {
-    const auto editing = std::make_shared<TagEditing>(Token{}, std::move(items), screen);
+    const auto editing = std::make_shared<TagEditing>(Token{}, std::move(items), screen, history);
     const auto read = [](ItemChange& reading) {
         TagLists tags;
         for (const auto& url : reading.items()) {
@@ -64,37 +62,29 @@ void TagEditing::apply(const TagEdit& edit)
         });
         return outcome;
     };
-    ItemChange::begin(
-        _asked, _items, work, [self = shared_from_this()](const Outcome& outcome) { self->tell(outcome); });
+    ItemChange::begin(_asked, _items, work,
+        [self = shared_from_this(), expected = UndoHistory::expect(_history.lock(), _asked)](
+            const Outcome& outcome) {
+            if (!outcome.changed.empty())
+                expected->add(undoOf(outcome.changed));
+            self->showErrors(outcome.errors);
+        });
 }
 
 /// The items get back the tags that each of them had.
-void TagEditing::undo(const std::vector<Tagged>& changed)
+UndoEntry TagEditing::undoOf(const std::vector<Tagged>& changed)
 {
     std::vector<Url> items;
     for (const auto& tagged : changed)
         items.push_back(tagged.item);
-    const auto work = [changed](ItemChange& change) {
+    const auto count = static_cast<std::int64_t>(changed.size());
+    const auto changeBack = [changed](ItemChange& change) {
         auto next = changed.begin();
         return change.forEachItem([&](const Url& item) {
             return FileUtils::setTags(item, (next++)->tagsBefore, change.stillWanted()).error;
         });
     };
-    ItemChange::begin(_asked, std::move(items), work,
-        [self = shared_from_this()](const std::vector<Error>& errors) { self->showErrors(errors); });
-}
-
-void TagEditing::tell(const Outcome& outcome)
-{
-    const auto screen = _screen.lock();
-    const auto window = screen ? screen->window() : nullptr;
-    if (window && !outcome.changed.empty() && _asked.isCurrent()) {
-        const auto count = static_cast<std::int64_t>(outcome.changed.size());
-        window->showNotice(localizedPlural(".DICT.TAGS_CHANGED.%d", {count}),
-            {localized("Undo"),
-                [self = shared_from_this(), changed = outcome.changed] { self->undo(changed); }});
-    }
-    showErrors(outcome.errors);
+    return {localizedPlural(".DICT.TAGS_CHANGED.%d", {count}), std::move(items), changeBack};
 }
 
 void TagEditing::showErrors(const std::vector<Error>& errors) const

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "items/AccountSession.h"
+#include "items/UndoHistory.h"
 #include "platform/Url.h"
 #include "prompts/TagChoices.h"
 
@@ -17,8 +17,8 @@ class ViewController;
 
 namespace tarrow {
 
-/// Asks over a screen which tags items shall have, gives them these tags, and tells of it in a message with
-/// which the change can be taken back. It lives until that message has gone. Main thread only.
+/// Asks over a screen which tags items shall have, and gives them these tags. It lives until they have them.
+/// Main thread only.
 class TagEditing : public std::enable_shared_from_this<TagEditing> {
     struct Token {
         explicit Token() = default;
@@ -26,9 +26,11 @@ class TagEditing : public std::enable_shared_from_this<TagEditing> {
 
 public:
     /// Reads the items' tags on a queue and shows the prompt. Nothing is shown when the account has changed
-    /// or the screen has gone meanwhile.
-    static void begin(std::vector<platform::Url> items, const std::shared_ptr<kit::ViewController>& screen);
-    TagEditing(Token, std::vector<platform::Url> items, std::weak_ptr<kit::ViewController> screen);
+    /// or the screen has gone meanwhile. The history, which may be null, gets an entry for the change.
+    static void begin(std::vector<platform::Url> items, const std::shared_ptr<kit::ViewController>& screen,
+        const std::shared_ptr<UndoHistory>& history);
+    TagEditing(Token, std::vector<platform::Url> items, std::weak_ptr<kit::ViewController> screen,
+        std::weak_ptr<UndoHistory> history);
 
 private:
     struct Tagged {
@@ -43,13 +45,13 @@ private:
 
     void show(TagLists tagsOfItems);
     void apply(const TagEdit& edit);
-    void undo(const std::vector<Tagged>& changed);
-    void tell(const Outcome& outcome);
+    static UndoEntry undoOf(const std::vector<Tagged>& changed);
     void showErrors(const std::vector<platform::Error>& errors) const;
 
     const AccountSession _asked;
     const std::vector<platform::Url> _items;
     std::weak_ptr<kit::ViewController> _screen;
+    std::weak_ptr<UndoHistory> _history;
 };
 
 } // namespace tarrow

@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "items/FileUtils.h"
+#include "items/ItemMoves.h"
 #include "items/UrlResolution.h"
 #include "kit/views/TextField.h"
 #include "prompts/UIUtils.h"
@@ -21,10 +22,9 @@ std::size_t characterCount(std::string_view text)
         text, [](char byte) { return (static_cast<unsigned char>(byte) & 0xC0U) != 0x80U; }));
 }
 
-} // namespace
-
-UIUtils::MaybeError UIUtils::renameItemAtURLToName(
-    const Url& url, const std::string& name, const FileUtils::StillWanted& stillWanted)
+/// Gives an item another name and answers the move; neither value nor error says that it has the name
+/// already.
+Result<MovedItem> rename(const Url& url, const std::string& name, const FileUtils::StillWanted& stillWanted)
 {
     static constexpr Operation op{"+[UIUtils renameItemAtURL:toName:]"};
     if (name.empty()) {
@@ -40,24 +40,48 @@ UIUtils::MaybeError UIUtils::renameItemAtURLToName(
     const auto resolved = trw_URLByResolvingBookmark(url).value_or(url);
     if (services().cloudDocumentService().promisedItems().isExternalDocumentReference(url))
         op.debug("Renaming bookmark %@ (%@)", url, resolved);
-    const auto destination = computeNewURLNewBasename(resolved, name);
+    const auto destination = UIUtils::computeNewURLNewBasename(resolved, name);
     if (resolved == destination) {
         op.debug("Rename: Old and new URLs are the same: %@ - %@", resolved, destination);
-        return std::nullopt;
+        return {};
     }
-    return FileUtils::moveTo(resolved, destination, stillWanted);
+    return moveItem(resolved, destination, stillWanted);
+}
+
+/// The outcome of giving an item another name.
+struct RenameOutcome {
+    UIUtils::MaybeError error;
+    std::optional<UndoEntry> undo;
+};
+
+RenameOutcome renameWhileWanted(const Url& url, const std::string& name, const ItemChange& change)
+{
+    if (!change.isWanted())
+        return {Error(FileErrorCode::Cancelled), {}};
+    const auto renamed = rename(url, name, change.stillWanted());
+    return {renamed.error, renamed ? undoOfMoves({*renamed}) : std::nullopt};
+}
+
+} // namespace
+
+UIUtils::MaybeError UIUtils::renameItemAtURLToName(
+    const Url& url, const std::string& name, const FileUtils::StillWanted& stillWanted)
+{
+    return rename(url, name, stillWanted).error;
 }
 
 std::shared_ptr<ItemChange> UIUtils::renameItemAtURLToNameCompletion(const Url& url, const std::string& name,
-    std::function<void(const MaybeError& error)> renamed, const AccountSession& asked)
+    std::function<void(const MaybeError& error)> renamed, const std::shared_ptr<UndoHistory>& history,
+    const AccountSession& asked)
 {
     return ItemChange::begin(
-        asked, {url},
-        [url, name](ItemChange& change) {
-            return change.isWanted() ? renameItemAtURLToName(url, name, change.stillWanted())
-                                     : MaybeError(Error(FileErrorCode::Cancelled));
-        },
-        std::move(renamed));
+        asked, {url}, [url, name](ItemChange& change) { return renameWhileWanted(url, name, change); },
+        [renamed = std::move(renamed), expected = UndoHistory::expect(history, asked)](
+            const RenameOutcome& outcome) {
+            renamed(outcome.error);
+            if (outcome.undo)
+                expected->add(*outcome.undo);
+        });
 }
 
 Url UIUtils::computeNewURLNewBasename(const Url& url, const std::string& name)

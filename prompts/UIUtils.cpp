@@ -68,6 +68,19 @@ void UIUtils::showErrorParentViewController(const MaybeError& error, const Scree
         error ? describe(*error) : localized("Mishap exception"), {}, parent);
 }
 
+void UIUtils::showErrorsTitleParentViewController(
+    const std::vector<Error>& errors, const std::string& title, const Screen& parent)
+{
+    if (errors.size() == 1)
+        return showErrorParentViewController(errors.front(), parent);
+    // More would not fit on a small screen.
+    constexpr std::size_t mostReasons = 3;
+    std::string reasons;
+    for (std::size_t i = 0; i < std::min(errors.size(), mostReasons); ++i)
+        reasons += (i == 0 ? "" : "\n") + describe(errors[i]);
+    showAlertMessageParentViewController(title, reasons, parent);
+}
+
 void UIUtils::showUnsupportedError(const Screen& parent)
 {
     showErrorParentViewController(Error(FileErrorCode::Unsupported), parent);

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "items/ItemChange.h"
+#include "items/UndoHistory.h"
 #include "platform/Error.h"
 #include "platform/Url.h"
 
@@ -46,10 +46,11 @@ public:
         const platform::Url& url, const std::string& name, const FileUtils::StillWanted& stillWanted = {});
     /// Begins the same on the queue on which all items are changed, and returns at once. `renamed` is called
     /// once, on the main thread, with what the operation above answers; FileErrorCode::Cancelled, after the
-    /// answered change was cancelled or who asked has signed out, says that the item kept its name.
+    /// answered change was cancelled or who asked has signed out, says that the item kept its name. The
+    /// history, which may be null, gets an entry.
     static std::shared_ptr<ItemChange> renameItemAtURLToNameCompletion(const platform::Url& url,
         const std::string& name, std::function<void(const MaybeError& error)> renamed,
-        const AccountSession& asked = AccountSession());
+        const std::shared_ptr<UndoHistory>& history, const AccountSession& asked = AccountSession());
     /// Answers the location of an item under a new name. The item's extension is appended unless the new name
     /// already ends with it, regardless of case.
     static platform::Url computeNewURLNewBasename(const platform::Url& url, const std::string& name);
@@ -76,6 +77,10 @@ public:
     /// Shows why an operation failed, as the title: the error's description, else its failure reason. A
     /// missing error is shown like one without either.
     static void showErrorParentViewController(const MaybeError& error, const Screen& parent);
+    /// Shows why something failed for some items, of which there is at least one: a single error like above,
+    /// several under the title with the reasons of the first ones.
+    static void showErrorsTitleParentViewController(
+        const std::vector<platform::Error>& errors, const std::string& title, const Screen& parent);
     /// Says that the folders that must stay as they are cannot be changed.
     static void showUnsupportedError(const Screen& parent);
 

@@ -62,6 +62,11 @@ TEST_F(BrowseTests, AnItemGoesToANewFolderThroughThePicker)
     expectGone("To do.txt");
     EXPECT_TRUE(std::filesystem::exists(top / "Photos/Lists/To do.txt"));
     EXPECT_TRUE(program->shows("Packing list.md"));
+    EXPECT_TRUE(eventually([this] { return program->says("“To do.txt” was moved to “Lists”"); }));
+    pressKey('z', Modifier::Control);
+    expectShown("To do.txt");
+    EXPECT_TRUE(std::filesystem::exists(top / "Desktop/To do.txt"));
+    EXPECT_TRUE(eventually([this] { return !program->shows("Undo"); })) << "its message went";
 }
 
 TEST_F(BrowseTests, AWindowSaysWhatNeedsNoAnswer)

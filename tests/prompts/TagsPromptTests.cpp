@@ -122,31 +122,10 @@ TEST_F(TagsPrompts, CancellingOrChangingNothingAnswersNothing)
     EXPECT_THAT(chosen, IsEmpty());
 }
 
-class NoticeKeeper : public kit::WindowObserver {
-public:
-    void rootDidChange(kit::Window&) override { }
-    void windowWillPresent(kit::Window&, const kit::Presentation&, kit::TransitionToken token) override
-    {
-        token.finish();
-    }
-    void windowWillDismiss(kit::Window&, const kit::Presentation&, kit::TransitionToken token) override
-    {
-        token.finish();
-    }
-    void windowShowsNotice(kit::Window&, const std::string& text, const kit::NoticeAction& shown) override
-    {
-        texts.push_back(text);
-        action = shown;
-    }
-    Names texts;
-    kit::NoticeAction action;
-};
-
 class EditingTags : public testing::Test {
 protected:
     EditingTags()
     {
-        window->setObserver(notices);
         window->setRootViewController(screen);
         window->makeKeyAndVisible();
         here = drive.writeDocument("Here.txt");
@@ -157,7 +136,7 @@ protected:
     }
     std::shared_ptr<TagsPrompt> begin()
     {
-        TagEditing::begin({here, promised}, screen);
+        TagEditing::begin({here, promised}, screen, history);
         drive.dispatch->runUntilIdle();
         const auto stack =
             std::dynamic_pointer_cast<kit::NavigationController>(screen->presentedViewController());
@@ -175,7 +154,12 @@ protected:
     static Names tags(const platform::Url& url) { return DRItem::initWithURL(url)->tags(); }
 
     testing_support::DriveFixture drive;
-    std::shared_ptr<NoticeKeeper> notices = std::make_shared<NoticeKeeper>();
+    Names offered; ///< what can be undone
+    std::shared_ptr<UndoHistory> history = std::make_shared<UndoHistory>(UndoHistory::Handlers{
+        .added = [this](auto, const UndoEntry& entry) { offered.push_back(entry.sentence); },
+        .begun = [](const auto&) {},
+        .ended = [](const auto&, const auto&) {},
+    });
     std::shared_ptr<kit::ViewController> screen = std::make_shared<kit::ViewController>();
     std::shared_ptr<kit::Window> window = std::make_shared<kit::Window>(platform::Rect{0, 0, 360, 640});
     platform::Url here = drive.url(""), promised = drive.url("");
@@ -191,9 +175,8 @@ TEST_F(EditingTags, ChangesWhatIsHereAndWhatIsPromisedAndTakesItBack)
     done(*prompt);
     EXPECT_THAT(tags(here), ElementsAre("New"));
     EXPECT_THAT(tags(promised), ElementsAre("Work", "New"));
-    EXPECT_THAT(notices->texts, ElementsAre(".DICT.TAGS_CHANGED.2"));
-    EXPECT_EQ(notices->action.title, "Undo");
-    notices->action.run();
+    EXPECT_THAT(offered, ElementsAre(".DICT.TAGS_CHANGED.2"));
+    history->undoLatest();
     drive.dispatch->runUntilIdle();
     EXPECT_THAT(tags(here), ElementsAre("Red"));
     EXPECT_THAT(tags(promised), ElementsAre("Red", "Work"));
@@ -208,7 +191,7 @@ TEST_F(EditingTags, SaysWhatCouldNotBeChangedAndNothingAfterASignOut)
     prompt->nameField()->userEdited("New", {});
     done(*prompt);
     EXPECT_THAT(tags(promised), ElementsAre("Red", "Work", "New"));
-    EXPECT_THAT(notices->texts, ElementsAre(".DICT.TAGS_CHANGED.1"));
+    EXPECT_THAT(offered, ElementsAre(".DICT.TAGS_CHANGED.1"));
     EXPECT_TRUE(std::dynamic_pointer_cast<kit::AlertController>(screen->presentedViewController()));
     screen->dismissViewController(false);
 
@@ -218,7 +201,7 @@ TEST_F(EditingTags, SaysWhatCouldNotBeChangedAndNothingAfterASignOut)
     prompt->nameField()->userEdited("Other", {});
     done(*prompt);
     EXPECT_THAT(tags(promised), ElementsAre("Red", "Work", "New"));
-    EXPECT_EQ(notices->texts.size(), 1U);
+    EXPECT_EQ(offered.size(), 1U);
 }
 
 } // namespace

@@ -30,12 +30,14 @@ public:
     {
         token.finish();
     }
-    void windowShowsNotice(Window&, const std::string& text, const kit::NoticeAction&) override
+    void windowShowsNotice(Window&, const std::string& text, const kit::NoticeAction& shown) override
     {
         texts.push_back(text);
+        action = shown;
     }
 
     std::vector<std::string> texts;
+    kit::NoticeAction action; ///< of the latest one
 };
 
 BrowserFixture::BrowserFixture()
@@ -111,6 +113,13 @@ void BrowserFixture::watch(kit::Window& shown)
 std::vector<std::string> BrowserFixture::takeNotices()
 {
     return std::exchange(notices->texts, {});
+}
+
+void BrowserFixture::pressNotice()
+{
+    if (const auto press = notices->action.run)
+        press();
+    settle();
 }
 
 std::string BrowserFixture::itemsText(std::size_t count)

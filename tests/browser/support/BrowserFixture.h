@@ -86,6 +86,8 @@ protected:
     void watch(kit::Window& shown);
     /// Answers what the window told the user since the last call.
     std::vector<std::string> takeNotices();
+    /// Presses the button of the latest of these messages.
+    void pressNotice();
     /// Answers the catalogue's text for a number of items.
     static std::string itemsText(std::size_t count);
 
