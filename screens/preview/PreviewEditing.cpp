@@ -3,10 +3,10 @@
 
 #include "screens/preview/PreviewEditing.h"
 
+#include "platform/CopyName.h"
 #include "platform/Dispatch.h"
 #include "platform/FileCoordinator.h"
 #include "platform/Services.h"
-#include "screens/preview/TextDecoding.h"
 
 #include <algorithm>
 #include <deque>
@@ -20,20 +20,6 @@ namespace {
 constexpr int mostCopies = 1000; ///< copies of one document
 /// Nobody fills in a form of more pages by hand, so its fields are not read.
 constexpr std::size_t mostPagesOfForm = 2000;
-
-/// "Plan.pdf" becomes "Plan 2.pdf". Of a long name the end before the extension is left out.
-std::string copyName(const std::string& name, int number)
-{
-    constexpr std::size_t longestName = 255; // bytes; the limit of Linux file systems
-    if (number == 1)
-        return name;
-    const auto dot = name.rfind('.');
-    const auto end = dot == std::string::npos || dot == 0 ? name.size() : dot;
-    const auto tail = ' ' + std::to_string(number) + name.substr(end);
-    const auto room = longestName - std::min(tail.size(), longestName);
-    const std::string_view stem(name.data(), end);
-    return std::string(end <= room ? stem : withoutCutCharacter(stem.substr(0, room))) + tail;
-}
 
 } // namespace
 
@@ -157,7 +143,8 @@ private:
         const auto folder = item.deletingLastPathComponent();
         std::optional<Error> error;
         for (int number = firstNumber; number <= mostCopies; ++number) {
-            const auto copy = folder.appendingPathComponent(copyName(item.lastPathComponent(), number));
+            const auto copy =
+                folder.appendingPathComponent(platform::copyName(item.lastPathComponent(), number));
             const auto refused = services().fileCoordinator().coordinateWriting(
                 copy, WritingOptions::None, [&](const Url& location) {
                     error = services().fileChanges().addDocument(location.path(), item.path(), bytes);

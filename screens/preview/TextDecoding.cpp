@@ -66,18 +66,6 @@ std::string decodedText(std::string_view bytes, TextEnd end, const TextDecoder& 
     return text;
 }
 
-std::string_view withoutCutCharacter(std::string_view bytes)
-{
-    for (std::size_t back = 1; back <= std::min<std::size_t>(4, bytes.size()); ++back) {
-        const auto byte = static_cast<unsigned char>(bytes[bytes.size() - back]);
-        if ((byte & 0xC0) == 0x80)
-            continue;
-        const std::size_t length = byte >= 0xF0 ? 4 : byte >= 0xE0 ? 3 : byte >= 0xC0 ? 2 : 1;
-        return length > back ? bytes.substr(0, bytes.size() - back) : bytes;
-    }
-    return bytes;
-}
-
 std::string withoutLongLines(const std::string& text, std::size_t maxLineBytes)
 {
     std::string cut;

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "platform/CopyName.h"
 #include "platform/TextDecoder.h"
 #include "screens/PlatformNames.h"
 
@@ -19,8 +20,7 @@ namespace screens {
 /// characters are dropped.
 std::string decodedText(std::string_view bytes, TextEnd end, const TextDecoder& decoder);
 
-/// Answers UTF-8 without an incomplete character at its end.
-std::string_view withoutCutCharacter(std::string_view bytes);
+using platform::withoutCutCharacter;
 
 /// Answers the text with every longer line cut at a character, and an ellipsis in place of the rest.
 std::string withoutLongLines(const std::string& text, std::size_t maxLineBytes);
