@@ -120,6 +120,7 @@ DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale,
     set.cloudDocumentService = cloud;
     set.activityHandOver = LocalActivityHandOver::create(cloud->layout(), dependencies, cloud);
     set.fileChanges = cloud->fileChanges();
+    set.trash = cloud->trash();
     set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
     set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>(
         host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination(),

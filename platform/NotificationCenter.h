@@ -21,6 +21,7 @@ enum class Notification {
     CloudIdentityDidChange, ///< another account, or none, is signed in; see CloudAccount
     StorageOfferDidChange, ///< there is another offer, or none any more; see StorageOfferManager
     DownloadsDidChange, ///< a download began, got on or ended; user information: "url", the document's
+    TrashDidChange, ///< something came into the trash or left it; see Trash
     ActivityOffersDidChange, ///< other devices offer other activities; see ActivityHandOver
     KeyValueStoreDidChangeExternally, ///< another program changed the values; see KeyValueStore
     KeyboardWillShow, ///< the keyboard on the screen appears; user information: "height" in points

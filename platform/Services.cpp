@@ -24,6 +24,7 @@
 #include "platform/PagedDocument.h"
 #include "platform/PreviewSupport.h"
 #include "platform/StorageOffers.h"
+#include "platform/Trash.h"
 #include "platform/TypeRegistry.h"
 #include "platform/UserDefaults.h"
 

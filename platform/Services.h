@@ -30,6 +30,7 @@ class PagedDocumentOpener;
 class PreviewSupport;
 class StorageOfferManager;
 class TextDecoder;
+class Trash;
 class TypeRegistry;
 class UserDefaults;
 
@@ -82,6 +83,8 @@ struct ServiceSet {
     std::shared_ptr<StorageOfferManager> storageOfferManager;
     /// Texts in the encodings from before Unicode.
     std::shared_ptr<TextDecoder> textDecoder;
+    /// What was removed and can come back.
+    std::shared_ptr<Trash> trash;
     /// The types of documents.
     std::shared_ptr<TypeRegistry> typeRegistry;
     /// Small values that this device keeps.
@@ -121,6 +124,7 @@ public:
     PreviewSupport& previewSupport() const { return *_set.previewSupport; }
     StorageOfferManager& storageOfferManager() const { return *_set.storageOfferManager; }
     TextDecoder& textDecoder() const { return *_set.textDecoder; }
+    Trash& trash() const { return *_set.trash; }
     TypeRegistry& typeRegistry() const { return *_set.typeRegistry; }
     UserDefaults& userDefaults() const { return *_set.userDefaults; }
 

@@ -107,6 +107,7 @@ DriveFixture::DriveFixture()
     handOver = host::drive::LocalActivityHandOver::create(cloud->layout(), dependencies, cloud);
     set.activityHandOver = handOver;
     set.fileChanges = cloud->fileChanges();
+    set.trash = cloud->trash();
     set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
     set.storageOfferManager = cloud->storageOffers();
     set.keyValueStore = cloud->keyValueStore();

@@ -60,6 +60,14 @@ bool holdsFolder(const TreeVersions& tree, const FileDescriptor& folder)
     return ::fstat(folder.get(), &found) == 0 && tree.contains({found.st_dev, found.st_ino});
 }
 
+/// Answers whether a tree is the one that was located.
+bool isStill(const LocatedItem& item, const TreeVersions& tree)
+{
+    const auto version = versionOf(item.found);
+    const auto same = tree.find({version.device, version.inode});
+    return same != tree.end() && isSameContent(version, same->second);
+}
+
 /// Copies an item under a temporary name beside its destination and gives the whole copy its name. Answers
 /// the versions that were copied.
 SystemResult<TreeVersions> copyTo(const LocatedItem& source, const DriveEntry& target,
@@ -159,11 +167,7 @@ SystemError LocalItemChanges::removeLocated(const LocatedItem& item)
     const auto after = readVersions(held->folder(), held->name());
     if (!after)
         return after.error;
-    const auto version = versionOf(item.found);
-    const auto same = after->find({version.device, version.inode});
-    const bool isUnchanged =
-        *before == *after && same != after->end() && isSameContent(version, same->second);
-    if (!isUnchanged)
+    if (*before != *after || !isStill(item, *after))
         return SystemError(changedMeanwhile, item.name);
     return held->remove(_store.get());
 }
@@ -212,6 +216,8 @@ SystemError LocalItemChanges::moveAcross(
     const auto before = readVersions(source.entry.folder, source.name);
     if (!before)
         return before.error;
+    if (!isStill(source, *before))
+        return SystemError(changedMeanwhile, source.name);
     if (holdsFolder(*before, target.folder))
         return SystemError(ownFolder, target.path);
     const auto temporary = uniqueName(WorkRecord::temporaryPrefix);

@@ -43,12 +43,19 @@ public:
     std::optional<platform::Error> addDocument(
         const std::string& path, const std::string& like, std::string_view content) override;
 
-private:
+    // These work on places that somebody has opened, which may lie in the trash. ECANCELED means that the
+    // item is not the one that was located any more.
+
+    /// Removes an item for good, with the contents behind its promises.
     system::SystemError removeLocated(const LocatedItem& item);
-    system::SystemError moveWithin(
+    /// Renames an item, whatever it is by now. Errors: EXDEV when the target is on another file system.
+    static system::SystemError moveWithin(
         const LocatedItem& source, const DriveEntry& target, const std::string& newName);
+    /// Copies an item to another file system and removes the original.
     system::SystemError moveAcross(
         const LocatedItem& source, const DriveEntry& target, const std::string& newName);
+
+private:
     system::SystemError removeMoved(
         const LocatedItem& source, const TreeVersions& before, const std::string& copy);
     void withdraw(const DriveEntry& target, const std::string& name, const TreeVersions& copied);

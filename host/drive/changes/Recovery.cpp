@@ -9,6 +9,7 @@
 #include "host/drive/changes/TreeCopy.h"
 #include "host/drive/changes/TreeWalk.h"
 #include "host/drive/records/BeneathRoot.h"
+#include "host/drive/records/ItemFacts.h"
 #include "host/drive/records/SmallFile.h"
 #include "host/system/files/DirectoryReader.h"
 #include "host/system/files/ItemPaths.h"
@@ -27,9 +28,6 @@ using host::system::lastName;
 using host::system::SystemError;
 
 namespace {
-
-/// The attribute with the place from which an item in the trash came.
-constexpr const char* originMark = "user.tarrow.origin";
 
 bool isThere(const DriveEntry& entry)
 {
@@ -80,9 +78,14 @@ void Recovery::run()
 platform::Result<DriveEntry> Recovery::entryAt(const std::string& path) const
 {
     const std::string name(lastName(path));
-    if (path != _layout.held() + '/' + name)
+    const auto& trash = _layout.trash();
+    const bool isHeld = path == _layout.held() + '/' + name;
+    if (!isHeld && !path.starts_with(trash + '/'))
         return DriveEntry::open(_layout, path);
-    auto folder = openOwnFolder(_layout.held());
+    // What is in the trash lies in a folder of its own there.
+    auto folder = isHeld
+        ? openOwnFolder(_layout.held())
+        : openBeneath(trash, "." + host::system::parentPath(path).substr(trash.size()), O_PATH | O_DIRECTORY);
     return folder ? platform::Result<DriveEntry>(DriveEntry{std::move(*folder), name, path})
                   : itemError(folder.error, path);
 }
@@ -96,12 +99,12 @@ bool Recovery::settle(const WorkRecord::Places& places)
 bool Recovery::settleCopy(const WorkRecord::Places& places)
 {
     static constexpr platform::Operation op{"-[Recovery settleCopy:]"};
-    const auto temporary = DriveEntry::open(_layout, places.working);
+    const auto temporary = entryAt(places.working);
     auto failure =
         temporary ? removeTree(temporary->folder, temporary->name) : SystemError(ENOENT, places.working);
     if ((!failure || failure.is(ENOENT)) && !places.copy.empty())
         failure = finishMove(places);
-    const auto document = DriveEntry::open(_layout, documentPath(places.item));
+    const auto document = entryAt(documentPath(places.item));
     if (document)
         dropRedundantPromise(*document, _store);
     if (!failure || failure.is(ENOENT))
@@ -112,7 +115,7 @@ bool Recovery::settleCopy(const WorkRecord::Places& places)
 
 SystemError Recovery::finishMove(const WorkRecord::Places& places)
 {
-    const auto item = DriveEntry::open(_layout, places.item), copy = DriveEntry::open(_layout, places.copy);
+    const auto item = entryAt(places.item), copy = entryAt(places.copy);
     if (!item || !copy || !isSameTree(item->folder, item->name, copy->folder, copy->name))
         return {};
     auto held = HeldItem::take(_layout, *item, item->name, places.copy);
@@ -136,7 +139,7 @@ bool Recovery::settleHeld(const WorkRecord::Places& places)
         return discard(moved, false);
     if (!isThere(*held))
         return true;
-    const auto copy = DriveEntry::open(_layout, places.copy);
+    const auto copy = entryAt(places.copy);
     if (copy && isSameTree(held->folder, held->name, copy->folder, copy->name))
         return discard(*held, false);
     return putBack(*held, places.item);
@@ -153,7 +156,7 @@ bool Recovery::discard(const DriveEntry& entry, bool contentsToo)
 
 bool Recovery::putBack(const DriveEntry& held, const std::string& item)
 {
-    const auto origin = DriveEntry::open(_layout, item);
+    const auto origin = entryAt(item);
     if (origin && differsInTagsAlone(held, *origin))
         return discard(held, false);
     const auto failure = origin ? renameEntry(held.folder, held.name, origin->folder, origin->name)
@@ -169,7 +172,7 @@ bool Recovery::moveToTrash(const DriveEntry& held, const std::string& item)
     constexpr int mostOfOneName = 1000;
     const auto trash = openOwnFolder(_layout.trash());
     const auto path = descriptorPath(held.folder) + '/' + held.name;
-    ::lsetxattr(path.c_str(), originMark, item.data(), item.size(), 0);
+    ::lsetxattr(path.c_str(), itemMark::origin, item.data(), item.size(), 0);
     const auto document = PromiseRecord::itemPathFor(lastName(item));
     auto failure = trash ? SystemError(EEXIST) : trash.error;
     for (int number = 1; failure.is(EEXIST) && number < mostOfOneName; ++number) {

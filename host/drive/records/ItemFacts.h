@@ -39,6 +39,7 @@ inline constexpr const char* shared = "user.tarrow.shared"; ///< "1"
 inline constexpr const char* role = "user.tarrow.role"; ///< "owner" or "participant"
 inline constexpr const char* status = "user.tarrow.status"; ///< "downloaded" or "current"
 inline constexpr const char* documentIdentifier = "user.tarrow.document-id"; ///< decimal
+inline constexpr const char* origin = "user.tarrow.origin"; ///< in the trash: the path where the item was
 inline constexpr const char* tags = "user.xdg.tags"; ///< names separated by commas
 } // namespace itemMark
 /// Answers tags as the text of their attribute, and the tags in such a text.

@@ -23,6 +23,7 @@ LocalCloudDocumentService::LocalCloudDocumentService(
     , _store(std::make_shared<LocalCloudStore>(layout))
     , _identifiers(LocalDocumentIdentifiers::create(layout, dependencies.dispatch))
     , _itemChanges(std::make_shared<IndexedItemChanges>(layout, _store, _identifiers))
+    , _trash(IndexedTrash::create(layout, _itemChanges, _store, _identifiers, dependencies))
     , _containers(std::make_shared<LocalContainers>(layout, settings.languages, _itemChanges))
     , _promisedItems(layout,
           ItemAttributes(dependencies.typeRegistry, _containers, dependencies.localization,

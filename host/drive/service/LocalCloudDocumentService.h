@@ -6,6 +6,7 @@
 #include "host/drive/records/DriveDependencies.h"
 #include "host/drive/service/AccountMonitor.h"
 #include "host/drive/service/IndexedItemChanges.h"
+#include "host/drive/service/IndexedTrash.h"
 #include "host/drive/service/LocalAccount.h"
 #include "host/drive/service/LocalCloudItems.h"
 #include "host/drive/service/LocalContainers.h"
@@ -34,6 +35,8 @@ public:
     const DriveLayout& layout() const { return _layout; }
     /// Answers the part that changes the drive's items.
     std::shared_ptr<platform::FileChanges> fileChanges() const { return _itemChanges; }
+    /// Answers the drive's trash.
+    std::shared_ptr<platform::Trash> trash() const { return _trash; }
     /// The account's storage offer, which is read from the account's file as well.
     const std::shared_ptr<LocalStorageOfferManager>& storageOffers() const { return _storageOffers; }
     /// The values that the account's devices share.
@@ -59,6 +62,7 @@ private:
     std::shared_ptr<CloudStore> _store;
     std::shared_ptr<LocalDocumentIdentifiers> _identifiers;
     std::shared_ptr<IndexedItemChanges> _itemChanges;
+    std::shared_ptr<IndexedTrash> _trash;
     std::shared_ptr<LocalContainers> _containers;
     LocalPromisedItems _promisedItems;
     LocalCloudItems _items;
