@@ -9,9 +9,11 @@
 #include "host/system/queues/GLibDispatch.h"
 #include "items/DocumentID.h"
 #include "items/FileUtils.h"
+#include "items/TrashUtils.h"
 #include "platform/FileChanges.h"
 #include "platform/FileSystem.h"
 #include "platform/NotificationCenter.h"
+#include "platform/Trash.h"
 
 #include <cstdio>
 #include <future>
@@ -28,6 +30,7 @@ namespace {
 using host::drive::LocalCloudDocumentService;
 using platform::Url;
 using tarrow::FileUtils;
+using tarrow::TrashUtils;
 
 std::shared_ptr<LocalCloudDocumentService> installDrive(const std::shared_ptr<platform::Dispatch>& dispatch)
 {
@@ -41,6 +44,7 @@ std::shared_ptr<LocalCloudDocumentService> installDrive(const std::shared_ptr<pl
     set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>(
         host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination()});
     set.fileChanges = cloud->fileChanges();
+    set.trash = cloud->trash();
     set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
     platform::installServices(std::move(set));
     return cloud;
@@ -83,6 +87,28 @@ const char* kindName(platform::FileType type)
         break;
     }
     return "other";
+}
+
+const char* reasonName(platform::TrashedItem::Reason reason)
+{
+    switch (reason) {
+    case platform::TrashedItem::Reason::Trashed:
+        return "trashed";
+    case platform::TrashedItem::Reason::NotPutBack:
+        return "not put back";
+    case platform::TrashedItem::Reason::KeptCopy:
+        break;
+    }
+    return "kept copy";
+}
+
+/// Prints what is in the trash: the reason, a tab, the name for `restore` and `drop`, a tab, where it was.
+int listTrash()
+{
+    const auto items = platform::services().trash().items();
+    for (const auto& item : items.value.value_or(std::vector<platform::TrashedItem>()))
+        std::printf("%s\t%s\t%s\n", reasonName(item.reason), item.identifier.c_str(), item.origin.c_str());
+    return report(items.error);
 }
 
 /// Downloads a document from the cloud and waits for the end.
@@ -144,6 +170,15 @@ int list(const Url& folder)
     return report(failed);
 }
 
+/// Works on an item in the trash, or answers 2 for an unknown command.
+int runInTrash(std::string_view command, const std::string& identifier)
+{
+    auto& trash = platform::services().trash();
+    if (command == "restore")
+        return report(trash.restore(identifier, std::nullopt).error);
+    return command == "drop" ? report(trash.remove(identifier)) : 2;
+}
+
 /// Answers the exit status, which is 2 for an unknown command.
 int run(std::string_view command, const std::vector<Url>& urls, host::system::GLibDispatch& dispatch)
 {
@@ -151,6 +186,10 @@ int run(std::string_view command, const std::vector<Url>& urls, host::system::GL
         return report(FileUtils::mkdir(urls[0]));
     if (command == "remove" && urls.size() == 1)
         return report(FileUtils::remove(urls[0]));
+    if (command == "trash" && urls.size() == 1)
+        return report(TrashUtils::moveToTrash(urls[0]).error);
+    if (command == "trashed" && urls.empty())
+        return listTrash();
     if (command == "move" && urls.size() == 2)
         return report(FileUtils::moveTo(urls[0], urls[1]));
     if (command == "save" && urls.size() == 2)
@@ -165,7 +204,7 @@ int run(std::string_view command, const std::vector<Url>& urls, host::system::GL
         return FileUtils::evictDocument(urls[0]) ? 0 : 1;
     if (command == "docid" && urls.size() == 1)
         return printIdentifier(urls[0]);
-    return 2;
+    return urls.size() == 1 ? runInTrash(command, urls[0].lastPathComponent()) : 2;
 }
 
 } // namespace
@@ -189,8 +228,9 @@ int main(int argc, char** argv)
         : arguments.size() > 1  ? run(arguments[1], urls, *dispatch)
                                 : 2;
     if (status == 2)
-        std::fputs("usage: tarrow-files list [PATH] | mkdir|remove|evict|fetch|docid PATH | move FROM TO | "
-                   "save PATH FROM | tag PATH [TAG...] | resolve ID\n",
+        std::fputs(
+            "usage: tarrow-files list [PATH] | mkdir|remove|evict|fetch|docid|trash PATH | move FROM TO | "
+            "save PATH FROM | tag PATH [TAG...] | resolve ID | trashed | restore|drop NAME\n",
             stderr);
     platform::installServices({});
     return status;

@@ -6,6 +6,7 @@
 #include "host/drive/changes/LocalCloudStore.h"
 #include "host/drive/changes/Recovery.h"
 #include "host/drive/records/PromiseRecord.h"
+#include "host/drive/trash/LocalTrash.h"
 
 #include <sys/syscall.h>
 
@@ -20,7 +21,10 @@ namespace sweep_tests {
 namespace fs = std::filesystem;
 
 using host::drive::PromiseRecord;
+using host::drive::TrashRecord;
 
+/// The name in the trash of a folder that was moved there.
+constexpr const char* trashedFolder = ".trwtrash-1";
 /// What stands in the picture of a drive for a promise's tag.
 constexpr const char* tagged = "tagged";
 
@@ -40,14 +44,20 @@ std::vector<Operation> operations()
         {"moveFileAcross", {"move", "inner/file.txt", "target/new.txt"}, FileSystems::Several},
         {"moveFolderAcross", {"move", "folder", "target/new"}, FileSystems::Several},
         {"movePromiseAcross", {"move", "inner/p.txt", "target/new.txt"}, FileSystems::Several},
-        {"save", {"save", "inner/file.txt", "folder/a.txt"}}, {"evict", {"evict", "inner/file.txt"}},
-        {"fetch", {"fetch", "inner/p.txt"}}, {"tagPromise", {"tag", "inner/p.txt", "Red", "Blue"}}};
+        {"trashFile", {"trash", "inner/file.txt"}}, {"trashFolder", {"trash", "folder"}},
+        {"trashPromise", {"trash", "inner/p.txt"}}, {"trashTwin", {"trash", "inner/twin.txt"}},
+        {"trashFolderAcross", {"trash", "folder"}, FileSystems::Several},
+        {"restore", {"restore", trashedFolder}},
+        {"restoreAcross", {"restore", trashedFolder}, FileSystems::Several},
+        {"drop", {"drop", trashedFolder}}, {"save", {"save", "inner/file.txt", "folder/a.txt"}},
+        {"evict", {"evict", "inner/file.txt"}}, {"fetch", {"fetch", "inner/p.txt"}},
+        {"tagPromise", {"tag", "inner/p.txt", "Red", "Blue"}}};
 }
 
 void SweepFixture::makeDrive() const
 {
     fs::remove_all(_layout.home());
-    for (const auto& folder : {"inner", "folder/sub", "folder/empty", "target"})
+    for (const auto& folder : {"inner", "folder/sub", "folder/empty", "target", "gone"})
         fs::create_directories(at(folder));
     fs::create_directories(_layout.cloud());
     write(at("inner/file.txt"), std::string(100'000, 'f'));
@@ -59,6 +69,12 @@ void SweepFixture::makeDrive() const
     write(at("inner/twin.txt"), "of the document");
     promise("inner/twin.txt", "that nobody has seen");
     promise("bystander.pdf", "kept");
+    promise("gone/q.pdf", "qqq");
+    write(at("gone/q.txt"), "text");
+    fs::create_directories(_layout.trash() + '/' + trashedFolder);
+    const auto place = _layout.trash() + '/' + trashedFolder;
+    write(place + '/' + TrashRecord::fileName, TrashRecord{"BrindleDefault/inner/gone", {1}}.text());
+    fs::rename(at("gone"), place + "/gone");
 }
 
 Ending SweepFixture::run(const FaultFor& faultFor) const
@@ -96,33 +112,62 @@ void SweepFixture::startAgain() const
 {
     host::drive::LocalCloudStore store(_layout);
     host::drive::Recovery(_layout, store).run();
+    static_cast<void>(host::drive::LocalTrash(_layout, nullptr, nullptr).items());
 }
 
 bool SweepFixture::isRemoval() const
 {
     const auto& command = GetParam().arguments[0];
-    return command == "remove" || command == "save";
+    return command == "remove" || command == "save" || command == "drop";
 }
 
 Drive SweepFixture::seen() const
 {
     Drive drive;
-    for (auto each = fs::recursive_directory_iterator(_layout.documents());
-         each != fs::recursive_directory_iterator(); ++each) {
+    addItems(drive, _layout.documents(), {});
+    for (const auto& place : trashPlaces()) {
+        const auto record = TrashRecord::parse(read(place + '/' + TrashRecord::fileName));
+        addItems(drive, place, "trashed " + (record ? record->origin : "from nowhere") + "/");
+    }
+    return drive;
+}
+
+void SweepFixture::addItems(Drive& drive, const std::string& folder, const std::string& prefix) const
+{
+    for (auto each = fs::recursive_directory_iterator(folder); each != fs::recursive_directory_iterator();
+         ++each) {
         const auto path = each->path().string();
+        const auto shown = prefix.empty() ? path : prefix + path.substr(folder.size() + 1);
         if (const auto item = PromiseRecord::itemPathFor(path)) {
-            drive["promise of " + *item] = behind(path);
+            const auto promised = prefix.empty() ? *item : *PromiseRecord::itemPathFor(shown);
+            drive["promise of " + promised] = behind(path);
             for (const auto& tag : PromiseRecord::parse(read(path)).value_or(PromiseRecord()).tags)
-                drive["tag " + tag + " of " + *item] = tagged;
+                drive["tag " + tag + " of " + promised] = tagged;
         } else if (each->path().filename().string().starts_with(".trw")) {
             each.disable_recursion_pending();
         } else {
-            drive[path] = each->is_symlink() ? "link to " + fs::read_symlink(path).string()
-                : each->is_directory()       ? "folder"
-                                             : read(path);
+            drive[shown] = each->is_symlink() ? "link to " + fs::read_symlink(path).string()
+                : each->is_directory()        ? "folder"
+                                              : read(path);
         }
     }
-    return drive;
+}
+
+std::vector<std::string> SweepFixture::trashPlaces() const
+{
+    std::vector<std::string> places;
+    std::error_code missing;
+    for (const auto& place : fs::directory_iterator(_layout.trash(), missing)) {
+        if (!host::drive::TrashPlace::isPlace(place.path().filename().string()))
+            continue;
+        const auto isItem = [](const auto& entry) {
+            return !entry.path().filename().string().starts_with(".trw");
+        };
+        if (std::ranges::any_of(fs::directory_iterator(place), isItem)
+            && fs::exists(place.path() / TrashRecord::fileName))
+            places.push_back(place.path().string());
+    }
+    return places;
 }
 
 Drive SweepFixture::noticed() const
@@ -143,11 +188,21 @@ std::vector<std::string> SweepFixture::leftovers() const
 {
     std::vector<std::string> found;
     std::size_t contents = 0;
+    const auto places = trashPlaces();
+    const auto isInTrash = [&](const std::string& path) {
+        return std::ranges::any_of(places, [&](const auto& place) {
+            const auto rest = path.starts_with(place) ? path.substr(place.size()) : std::string("?");
+            return rest.empty() || rest == "/" + std::string(TrashRecord::fileName)
+                || (rest.starts_with('/') && !rest.starts_with("/.trw"));
+        });
+    };
     for (const auto& entry : fs::recursive_directory_iterator(_layout.home())) {
         const auto path = entry.path().string();
         const auto name = entry.path().filename().string();
         if (path.starts_with(_layout.cloud() + '/'))
             ++contents;
+        else if (isInTrash(path))
+            continue;
         else if (name.starts_with(".trw") || path.starts_with(_layout.held() + '/')
             || path.starts_with(_layout.trash() + '/'))
             found.push_back(path.substr(_layout.home().size() + 1));

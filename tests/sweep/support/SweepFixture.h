@@ -71,6 +71,9 @@ protected:
     const host::drive::DriveLayout _layout = host::drive::DriveLayout::at(_folder.at("drive")).prepare();
 
 private:
+    void addItems(Drive& drive, const std::string& folder, const std::string& prefix) const;
+    /// Answers the places in the trash with an item and a record.
+    std::vector<std::string> trashPlaces() const;
     bool isForOtherFileSystem(const FileCall& call) const;
     void promise(const std::string& path, const std::string& content) const;
     std::string behind(const std::string& promisePath) const;
