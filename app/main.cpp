@@ -113,19 +113,21 @@ ServiceSet systemServices(const std::string& executable, const UserLocale& local
 DriveLayout addDriveServices(ServiceSet& set, const UserLocale& locale,
     const std::shared_ptr<const platform::ThumbnailMaker>& thumbnailMaker)
 {
-    const host::drive::DriveDependencies dependencies{
-        set.dispatch, set.notificationCenter, set.typeRegistry, set.localization, set.linkOpener};
-    const auto cloud = LocalCloudDocumentService::create(DriveLayout::fromEnvironment(), dependencies,
-        {.languages = locale.languageList(), .thumbnailMaker = thumbnailMaker});
+    const auto layout = DriveLayout::fromEnvironment().prepare();
+    set.fileCoordinator =
+        std::make_shared<host::system::LocalFileCoordinator>(host::system::LocalFileCoordinator::Settings{
+            .lockFile = layout.coordination(), .root = layout.documents(), .dispatch = set.dispatch});
+    const host::drive::DriveDependencies dependencies{set.dispatch, set.notificationCenter, set.typeRegistry,
+        set.localization, set.linkOpener, set.fileCoordinator};
+    const auto cloud = LocalCloudDocumentService::create(layout, dependencies,
+        {.languages = locale.languageList(),
+            .thumbnailMaker = thumbnailMaker,
+            .putRight = LocalCloudDocumentService::Settings::PutRight::Beside});
     set.cloudDocumentService = cloud;
     set.activityHandOver = LocalActivityHandOver::create(cloud->layout(), dependencies, cloud);
     set.fileChanges = cloud->fileChanges();
     set.trash = cloud->trash();
     set.fileSystem = std::make_shared<host::system::PosixFileSystem>();
-    set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>(
-        host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination(),
-            .root = cloud->layout().documents(),
-            .dispatch = set.dispatch});
     set.launcherShortcuts =
         std::make_shared<host::gtk::DesktopShortcuts>(host::gtk::DesktopShortcuts::Settings{
             cloud->layout().recentDocument(), host::gtk::DesktopShortcuts::sharedRecentFiles(),

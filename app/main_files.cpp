@@ -38,11 +38,12 @@ std::shared_ptr<LocalCloudDocumentService> installDrive(const std::shared_ptr<pl
     set.dispatch = dispatch;
     set.notificationCenter = std::make_shared<platform::NotificationCenter>();
     set.typeRegistry = std::make_shared<host::system::MimeTypeRegistry>();
-    auto cloud = LocalCloudDocumentService::create(host::drive::DriveLayout::fromEnvironment(),
-        {set.dispatch, set.notificationCenter, set.typeRegistry, nullptr, nullptr}, {});
-    set.cloudDocumentService = cloud;
+    const auto layout = host::drive::DriveLayout::fromEnvironment().prepare();
     set.fileCoordinator = std::make_shared<host::system::LocalFileCoordinator>(
-        host::system::LocalFileCoordinator::Settings{.lockFile = cloud->layout().coordination()});
+        host::system::LocalFileCoordinator::Settings{.lockFile = layout.coordination()});
+    auto cloud = LocalCloudDocumentService::create(layout,
+        {set.dispatch, set.notificationCenter, set.typeRegistry, nullptr, nullptr, set.fileCoordinator}, {});
+    set.cloudDocumentService = cloud;
     set.fileChanges = cloud->fileChanges();
     set.trash = cloud->trash();
     set.fileSystem = std::make_shared<host::system::PosixFileSystem>();

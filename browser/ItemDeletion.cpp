@@ -4,6 +4,7 @@
 #include "browser/ItemDeletion.h"
 
 #include "items/FileUtils.h"
+#include "platform/FileCoordinator.h"
 
 namespace tarrow {
 
@@ -46,7 +47,13 @@ void deleteLibrary(const Url& url, DeletionOutcome& outcome)
         failed(outcome, std::nullopt);
     } else {
         op.info("Deleting container %{public}@", container->identifier);
-        if (auto error = containers().deleteContents(*container)) {
+        std::optional<Error> error;
+        const auto refused =
+            services().fileCoordinator().coordinateWriting(url, platform::WritingOptions::ForDeleting,
+                [&](const Url&) { error = containers().deleteContents(*container); });
+        if (refused)
+            error = refused;
+        if (error) {
             op.warning("Failed to delete container %{public}@: %{public}@", container->identifier, *error);
             failed(outcome, std::move(error));
         }

@@ -160,7 +160,10 @@ std::optional<Error> FileUtils::moveTo(
 bool FileUtils::evictDocument(const Url& url)
 {
     static constexpr Operation op{"+[FileUtils evictDocument:]"};
-    const auto error = changes().evictItem(url.path());
+    std::optional<Error> failed;
+    const auto refused = coordinator().coordinateWriting(url, WritingOptions::None,
+        [&](const Url& location) { failed = changes().evictItem(location.path()); });
+    const auto error = refused ? refused : failed;
     if (error)
         op.warning("Evict error: %@", *error);
     return !error;

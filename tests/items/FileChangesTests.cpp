@@ -1,6 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
+#include "host/drive/records/PromiseFile.h"
 #include "items/FileUtils.h"
 #include "platform/FilePresenter.h"
 #include "tests/items/support/ItemsFixture.h"
@@ -96,7 +97,7 @@ TEST_F(FileChangesTest, RemovesWhatItWasAskedToAndNothingElse)
                 StartsWith("INFO Coordinated Write returned ")));
         EXPECT_FALSE(isThere(url) || isThere(promiseOf(url))) << url.path();
     }
-    EXPECT_FALSE(isThere(content));
+    EXPECT_FALSE(isThere(content)); // nobody can fetch it but through a copied promise
     EXPECT_EQ(contentOf(kept), "precious");
     EXPECT_FALSE(hasTraces());
     // A missing file has no date, so nothing shows that it is unchanged.
@@ -280,7 +281,7 @@ TEST_F(FileChangesTest, EvictsADocumentAndKeepsWhatIsKnownOfIt)
         FileUtils::getResourceValueForURL(AttributeKey::FileSize, url), AttributeValue(std::uint64_t{5}));
     EXPECT_EQ(FileUtils::getResourceValueForURL(AttributeKey::ContentModificationDate, url), date);
     EXPECT_THAT(DriveFixture::cloud->promisedItems().readItem(url, {}).tagNames, ElementsAre("Red", "Blue"));
-    const auto promise = host::drive::PromiseRecord::parse(contentOf(promiseOf(url)));
+    const auto promise = host::drive::readPromise(promiseOf(url).path()).value;
     ASSERT_TRUE(promise);
     EXPECT_EQ(contentOf(Url::fileURL(layout().cloud() + '/' + promise->content)), "12345");
     EXPECT_TRUE(FileUtils::evictDocument(url)) << "there is no copy any more";

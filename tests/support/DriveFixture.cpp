@@ -100,7 +100,7 @@ DriveFixture::DriveFixture()
     set.keyedArchiver = std::make_shared<host::system::JsonKeyedArchiver>();
     set.userDefaults = std::make_shared<host::system::JsonUserDefaults>(layout.defaults(), *dispatch);
     host::drive::DriveDependencies dependencies{
-        dispatch, notifications, set.typeRegistry, set.localization, set.linkOpener};
+        dispatch, notifications, set.typeRegistry, set.localization, set.linkOpener, fileCoordinator};
     cloud = host::drive::LocalCloudDocumentService::create(layout, dependencies,
         {{"en"}, _folder.at("thumbnails"), std::make_shared<host::previews::DocumentThumbnails>()});
     set.cloudDocumentService = cloud;

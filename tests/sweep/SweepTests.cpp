@@ -17,17 +17,7 @@ using sweep_tests::Ending;
 using sweep_tests::Fault;
 using sweep_tests::FileCall;
 
-class Sweep : public sweep_tests::SweepFixture {
-protected:
-    /// After an interrupted save only the user can say which of the two versions is wanted, so both may be
-    /// left.
-    static testing::Matcher<std::vector<std::string>> isWhatMayBeLeft()
-    {
-        if (GetParam().arguments[0] == "save")
-            return testing::Each(std::string("trash/file.txt"));
-        return testing::IsEmpty();
-    }
-};
+class Sweep : public sweep_tests::SweepFixture { };
 
 TEST_P(Sweep, AKillAtAnyCallLosesNothingAndTheNextStartPutsItRight)
 {
@@ -58,7 +48,7 @@ TEST_P(Sweep, AKillAtAnyCallLosesNothingAndTheNextStartPutsItRight)
         const bool isOnTheWay = GetParam().arguments[0] == "mkdir" && std::ranges::includes(now, before)
             && std::ranges::includes(after, now);
         EXPECT_TRUE(now == before || now == after || isOnTheWay) << differences(now, before);
-        EXPECT_THAT(leftovers(), isWhatMayBeLeft());
+        EXPECT_THAT(leftovers(), testing::IsEmpty());
     });
 }
 
@@ -83,7 +73,7 @@ TEST_P(Sweep, AFailureOfAnyCallLeavesAllAsItWasOrAllDone)
                 << "status " << ending.status << differences(now, before);
             if (!leftovers().empty())
                 startAgain();
-            EXPECT_THAT(leftovers(), isWhatMayBeLeft());
+            EXPECT_THAT(leftovers(), testing::IsEmpty());
             EXPECT_TRUE(noticed() == now) << differences(noticed(), now);
         });
     }

@@ -5,12 +5,11 @@
 
 #include "host/drive/changes/DriveEntry.h"
 #include "host/drive/records/StorageSpace.h"
-#include "platform/Date.h"
+#include "platform/Error.h"
 
 #include <functional>
 #include <optional>
 #include <string>
-#include <vector>
 
 namespace host::drive {
 
@@ -34,16 +33,16 @@ public:
     /// is another version by now stays or is put back (ECANCELED).
     virtual system::SystemError store(
         const DriveEntry& document, const platform::ItemVersion& version, const std::string& content) = 0;
-    /// Removes a content for good. A content that does not exist is no error.
-    virtual system::SystemError remove(const std::string& content) = 0;
-    /// Gives a content another name. It never replaces one (EEXIST).
-    virtual system::SystemError move(const std::string& content, const std::string& newContent) = 0;
+    /// Is told that a promise of this content goes for good. The content stays, and can be fetched, until it
+    /// is certain that no other promise names it, for another program may have copied the promise. A content
+    /// that does not exist is no error.
+    virtual system::SystemError release(const std::string& content) = 0;
+    /// Answers whether the store has a content, or nothing when that cannot be told.
+    virtual std::optional<bool> has(const std::string& content) = 0;
 
     /// Answers whether the store holds a content of this name that differs from an open document. A content
     /// that cannot be compared counts as different.
     virtual bool holdsOtherThan(const std::string& content, const system::FileDescriptor& document) = 0;
-    /// Answers the names of the contents that were stored or changed since a moment, in no order.
-    virtual platform::Result<std::vector<std::string>> listChanges(platform::Date since) = 0;
     /// Answers the space that the store has.
     virtual platform::Result<StorageSpace> quota() = 0;
 };

@@ -4,7 +4,7 @@
 #include "host/drive/changes/Discarding.h"
 
 #include "host/drive/changes/CloudStore.h"
-#include "host/drive/changes/PromiseFile.h"
+#include "host/drive/changes/Promises.h"
 #include "host/drive/changes/TreeWalk.h"
 
 #include <fcntl.h>
@@ -58,7 +58,7 @@ public:
             if (!content)
                 return note(content.error);
             if (!content->empty()) {
-                if (const auto failed = _store->remove(*content))
+                if (const auto failed = _store->release(*content))
                     return note(failed);
                 hasBegun = true;
             }

@@ -4,15 +4,14 @@
 #include "host/drive/changes/DownloadWork.h"
 
 #include "host/drive/changes/HeldItem.h"
+#include "host/drive/changes/ItemTraits.h"
 #include "host/drive/changes/NewFile.h"
-#include "host/drive/changes/PromiseFile.h"
-#include "host/drive/records/ItemFacts.h"
+#include "host/drive/changes/Promises.h"
+#include "host/drive/records/ItemMarks.h"
 #include "host/drive/records/SmallFile.h"
-#include "host/system/files/PosixFileSystem.h"
 #include "host/system/texts/Translate.h"
 
 #include <fcntl.h>
-#include <sys/xattr.h>
 
 #include <cerrno>
 
@@ -20,38 +19,13 @@ namespace host::drive {
 
 using host::system::FileDescriptor;
 using host::system::SystemError;
+using host::system::SystemResult;
 using platform::Error;
 using platform::FileErrorCode;
 
 namespace {
 
 constexpr std::int64_t nanosecondsPerSecond = 1'000'000'000;
-
-/// Copies the attributes and the modification date in the promise to the file.
-SystemError mark(const FileDescriptor& file, const PromiseRecord& promise)
-{
-    const auto* const role = !promise.role ? "" : nameOf(*promise.role);
-    const auto identifier = promise.documentIdentifier;
-    const std::pair<const char*, std::string> marks[] = {{itemMark::tags, joinedTags(promise.tags)},
-        {itemMark::shared, promise.shared ? "1" : ""}, {itemMark::role, role},
-        {itemMark::documentIdentifier, identifier != 0 ? std::to_string(identifier) : ""},
-        {system::hiddenExtensionAttribute, promise.extensionHidden ? "1" : ""},
-        {itemMark::status, "current"}};
-    for (const auto& [name, value] : marks) {
-        if (!value.empty() && ::fsetxattr(file.get(), name, value.data(), value.size(), 0) != 0)
-            return SystemError::last(name);
-    }
-    if (!promise.modified)
-        return {};
-    auto seconds = promise.modified->nanoseconds / nanosecondsPerSecond;
-    auto rest = promise.modified->nanoseconds % nanosecondsPerSecond;
-    if (rest < 0) {
-        --seconds;
-        rest += nanosecondsPerSecond;
-    }
-    const timespec times[] = {{0, UTIME_OMIT}, {seconds, rest}};
-    return SystemError::unless(::futimens(file.get(), times) == 0);
-}
 
 /// A download that ended early must not take the place of the document.
 SystemError checkSize(const FileDescriptor& file, const PromiseRecord& promise)
@@ -63,47 +37,152 @@ SystemError checkSize(const FileDescriptor& file, const PromiseRecord& promise)
     return isShort ? SystemError(EIO) : SystemError();
 }
 
-/// Gives the new document the tags that its promise was given during the download.
-SystemError takeNewTags(const FileDescriptor& file, const DriveEntry& entry, const PromiseRecord& promise)
+SystemError setModified(const FileDescriptor& file, const platform::Date& modified)
 {
-    const auto now = readPromise(entry);
-    return !now || now->tags == promise.tags ? SystemError() : writeTags(file, now->tags);
+    auto seconds = modified.nanoseconds / nanosecondsPerSecond;
+    auto rest = modified.nanoseconds % nanosecondsPerSecond;
+    if (rest < 0) {
+        --seconds;
+        rest += nanosecondsPerSecond;
+    }
+    const timespec times[] = {{0, UTIME_OMIT}, {seconds, rest}};
+    return SystemError::unless(::futimens(file.get(), times) == 0);
 }
 
-/// Removes the promise, or the new document when its promise was meanwhile deleted or moved away: such a
-/// document must not appear in its old place again.
-SystemError settlePromise(const DriveLayout& layout, const DriveEntry& entry, CloudStore& store,
-    const platform::ItemVersion& published)
-{
-    if (statusAt(entry.folder, entry.promiseName())) {
-        dropRedundantPromise(entry, store);
-        return {};
+/// One promised document that takes its promise's place.
+class Arrival {
+public:
+    Arrival(const DriveLayout& layout, CloudStore& store, const DriveEntry& entry, OpenPromise& promise)
+        : _layout(layout)
+        , _store(store)
+        , _entry(entry)
+        , _promise(promise)
+    {
     }
-    if (auto held = HeldItem::take(layout, entry, entry.name)) {
-        const auto found = statusAt(held->folder(), held->name());
-        // A document that cannot be removed is put back, because one document too many is better than one too
-        // few.
-        if (found && isSameContent(published, versionOf(*found)))
-            static_cast<void>(held->remove(nullptr));
-    }
-    return {ENOENT, entry.promiseName()};
-}
+    SystemError fetch(const CloudStore::Progress& progress);
+    SystemError takePlace();
 
-SystemError fetchInto(const DriveLayout& layout, CloudStore& store, const DriveEntry& entry,
-    const PromiseRecord& promise, const CloudStore::Progress& progress)
+private:
+    enum class Place : std::uint8_t { Promised, Taken };
+    SystemError takeOver();
+    SystemResult<Place> look() const;
+    SystemError removePromise();
+    SystemError adoptChanges();
+    SystemError withdraw();
+
+    const DriveLayout& _layout;
+    CloudStore& _store;
+    const DriveEntry& _entry;
+    OpenPromise& _promise;
+    std::optional<NewFile> _file;
+    ItemTraits _traits; ///< of the promise, as the document has taken them over
+    platform::ItemVersion _published;
+};
+
+SystemError Arrival::fetch(const CloudStore::Progress& progress)
 {
-    auto file = NewFile::create(layout, entry);
+    auto file = NewFile::create(_layout, _entry);
     if (!file)
         return file.error;
-    TRW_TRY(store.fetch(promise.content, file->descriptor(), progress));
-    TRW_TRY(checkSize(file->descriptor(), promise));
-    TRW_TRY(mark(file->descriptor(), promise));
+    _file.emplace(std::move(*file));
+    TRW_TRY(_store.fetch(_promise.record.content, _file->descriptor(), progress));
+    return checkSize(_file->descriptor(), _promise.record);
+}
+
+/// Gives the new document what the promise says now, because tags, an identifier or access may have changed
+/// during the download.
+SystemError Arrival::takeOver()
+{
+    auto now = readPromise(_promise.file);
+    if (!now)
+        return now.error;
+    auto traits = ItemTraits::read(_promise.file);
+    if (!traits)
+        return traits.error;
+    _promise.record = std::move(*now);
+    _traits = *traits;
+    traits->attributes[itemMark::status] = "current";
+    if (_promise.record.created)
+        traits->attributes[itemMark::created] = std::to_string(_promise.record.created->nanoseconds);
+    // The record comes first, because the attributes count before it and the access may forbid more writing.
+    const auto failure = writeMarks(_file->descriptor(), _promise.record);
+    if (failure && !failure.is(EOPNOTSUPP))
+        return failure;
+    TRW_TRY(traits->write(_file->descriptor()));
+    return _promise.record.modified ? setModified(_file->descriptor(), *_promise.record.modified)
+                                    : SystemError();
+}
+
+/// Answers whether the promise is still in its place, or a document has taken it. Errors: ENOENT when there
+/// is neither, ESTALE when another promise is there.
+SystemResult<Arrival::Place> Arrival::look() const
+{
+    const auto content = contentOfPromise(_entry.folder, _entry.promiseName());
+    if (!content)
+        return content.error;
+    if (*content == _promise.record.content)
+        return Place::Promised;
+    const auto document = _entry.status();
+    if (!document)
+        return document.error.is(ENOENT) && !content->empty() ? SystemError(ESTALE, _entry.promiseName())
+                                                              : document.error;
+    return S_ISREG(document->st_mode) ? SystemResult<Place>(Place::Taken) : SystemError(EEXIST, _entry.name);
+}
+
+SystemError Arrival::takePlace()
+{
+    const auto place = look();
+    if (!place)
+        return place.error;
+    if (*place == Place::Taken)
+        return {};
+    TRW_TRY(takeOver());
     struct stat whole;
-    if (::fstat(file->descriptor().get(), &whole) != 0)
-        return SystemError::last(entry.name);
-    TRW_TRY(file->publish(entry, entry.name));
-    TRW_TRY(takeNewTags(file->descriptor(), entry, promise));
-    return settlePromise(layout, entry, store, versionOf(whole));
+    if (::fstat(_file->descriptor().get(), &whole) != 0)
+        return SystemError::last(_entry.name);
+    _published = versionOf(whole);
+    TRW_TRY(_file->publish(_entry, _entry.name));
+    return removePromise();
+}
+
+/// Removes the promise. Whatever else is in its place stays, and so does the promise if it cannot be removed:
+/// the document hides it until the next start settles both.
+SystemError Arrival::removePromise()
+{
+    auto held = takePromise(_layout, _entry, _promise.record.content);
+    if (held.error.is(ENOENT))
+        return withdraw();
+    if (held.error.is(ESTALE))
+        return {};
+    if (!held || adoptChanges() || held->remove(&_store))
+        _file->keepRecord();
+    return {};
+}
+
+SystemError Arrival::adoptChanges()
+{
+    const auto now = ItemTraits::read(_promise.file);
+    return now ? now->writeChanges(_traits, _file->descriptor()) : now.error;
+}
+
+/// Removes the new document, because another program took its promise away in the moment before: it must not
+/// appear in its old place again. In doubt it stays, because one document too many is better than one too
+/// few.
+SystemError Arrival::withdraw()
+{
+    if (!_store.has(_promise.record.content).value_or(false))
+        return {};
+    auto held = HeldItem::take(_layout, _entry, _entry.name);
+    if (!held)
+        return {};
+    const auto found = statusAt(held->folder(), held->name());
+    const bool isGone = found && isSameContent(_published, versionOf(*found)) && !held->remove(nullptr);
+    return isGone ? SystemError(ENOENT, _entry.promiseName()) : SystemError();
+}
+
+bool isThere(const DriveEntry& entry)
+{
+    return static_cast<bool>(entry.find());
 }
 
 Error missingContent(const std::string& path)
@@ -112,28 +191,42 @@ Error missingContent(const std::string& path)
         system::textKey("The content of the document isn’t in the cloud."));
 }
 
-} // namespace
-
-std::optional<Error> bringHere(const DriveLayout& layout, CloudStore& store, const std::string& path,
-    const CloudStore::Progress& progress)
+/// Makes one attempt, which a later eviction by another process defeats (ESTALE).
+std::optional<Error> tryToBringHere(const DriveLayout& layout, CloudStore& store, const std::string& path,
+    const CloudStore::Progress& progress, const KeepingOthersOut& keepingOthersOut)
 {
     const auto item = LocatedItem::locate(layout, path);
     if (!item || !item->isPromise())
         return item.error;
-    const auto promise = readPromise(item->entry);
+    auto promise = OpenPromise::open(item->entry);
     if (!promise)
-        return promise.error;
-    if (promise->kind != PromiseRecord::Kind::File)
+        return itemError(promise.error, path);
+    const auto& record = promise->record;
+    if (record.kind != PromiseRecord::Kind::File)
         return Error(FileErrorCode::Unsupported);
-    if (promise->content.empty())
+    if (record.content.empty())
         return missingContent(path);
-    const auto failure = fetchInto(layout, store, item->entry, *promise, progress);
-    if (!failure)
-        return std::nullopt;
-    // Either the promise or its content may be missing.
-    if (failure.is(ENOENT) && item->entry.find())
+    Arrival arrival(layout, store, item->entry, *promise);
+    auto failure = arrival.fetch(progress);
+    if (failure.is(ENOENT) && store.has(record.content) == false && isThere(item->entry))
         return missingContent(path);
-    return itemError(failure, path);
+    if (!failure) {
+        if (auto refused = keepingOthersOut([&] { failure = arrival.takePlace(); }))
+            return refused;
+    }
+    return failure ? std::optional(itemError(failure, path)) : std::nullopt;
+}
+
+} // namespace
+
+std::optional<Error> bringHere(const DriveLayout& layout, CloudStore& store, const std::string& path,
+    const CloudStore::Progress& progress, const KeepingOthersOut& keepingOthersOut)
+{
+    constexpr int mostTries = 3;
+    auto error = tryToBringHere(layout, store, path, progress, keepingOthersOut);
+    for (int tries = 1; tries < mostTries && error && error->code() == ESTALE; ++tries)
+        error = tryToBringHere(layout, store, path, progress, keepingOthersOut);
+    return error;
 }
 
 } // namespace host::drive

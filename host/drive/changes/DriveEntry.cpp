@@ -6,21 +6,56 @@
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/PromiseRecord.h"
 #include "host/drive/records/SmallFile.h"
+#include "host/system/files/DriveNames.h"
 #include "host/system/files/SystemErrors.h"
+#include "host/system/texts/Translate.h"
+#include "platform/Localization.h"
 
 #include <fcntl.h>
-#include <signal.h>
 
 #include <cerrno>
-#include <charconv>
 
 namespace host::drive {
 
 using host::system::FileDescriptor;
 using host::system::SystemError;
 using host::system::SystemResult;
+using platform::Error;
 using platform::ItemVersion;
 using platform::Result;
+
+namespace {
+
+/// A file has both names for a moment, and the new one is never another item's.
+SystemError renameByLink(
+    const FileDescriptor& from, const std::string& name, const FileDescriptor& to, const std::string& newName)
+{
+    if (::linkat(from.get(), name.c_str(), to.get(), newName.c_str(), 0) != 0) {
+        const bool isImpossible = errno == EPERM || errno == ENOSYS || errno == EOPNOTSUPP;
+        return isImpossible ? SystemError(EOPNOTSUPP, name) : SystemError::last(name);
+    }
+    if (::unlinkat(from.get(), name.c_str(), 0) == 0)
+        return {};
+    auto failure = SystemError::last(name);
+    ::unlinkat(to.get(), newName.c_str(), 0);
+    return failure;
+}
+
+/// A folder replaces an empty one, and that is the one that was made here: what another program puts into it
+/// keeps it (ENOTEMPTY).
+SystemError renameFolderByClaim(
+    const FileDescriptor& from, const std::string& name, const FileDescriptor& to, const std::string& newName)
+{
+    if (::mkdirat(to.get(), newName.c_str(), S_IRWXU) != 0)
+        return SystemError::last(newName);
+    if (::renameat(from.get(), name.c_str(), to.get(), newName.c_str()) == 0)
+        return {};
+    auto failure = SystemError::last(name);
+    ::unlinkat(to.get(), newName.c_str(), AT_REMOVEDIR);
+    return failure;
+}
+
+} // namespace
 
 Result<DriveEntry> DriveEntry::open(const DriveLayout& layout, const std::string& path)
 {
@@ -58,9 +93,11 @@ SystemResult<DriveEntry::Found> DriveEntry::find() const
     if (!own.error.is(ENOENT))
         return own.error;
     auto promise = promiseName();
-    if (const auto promised = statusAt(folder, promise))
+    const auto promised = statusAt(folder, promise);
+    if (promised)
         return Found{std::move(promise), *promised};
-    return own.error;
+    // A name that is too long for a promise has none.
+    return promised.error.is(ENOENT) || promised.error.is(ENAMETOOLONG) ? own.error : promised.error;
 }
 
 SystemError DriveEntry::checkIsFree() const
@@ -100,26 +137,45 @@ SystemResult<struct stat> statusAt(const FileDescriptor& folder, const std::stri
 SystemError renameEntry(
     const FileDescriptor& from, const std::string& name, const FileDescriptor& to, const std::string& newName)
 {
-    const int done = ::renameat2(from.get(), name.c_str(), to.get(), newName.c_str(), RENAME_NOREPLACE);
-    return SystemError::unless(done == 0, name);
+    if (::renameat2(from.get(), name.c_str(), to.get(), newName.c_str(), RENAME_NOREPLACE) == 0)
+        return {};
+    if (errno != EINVAL)
+        return SystemError::last(name);
+    // Either the file system does not know the flag, or a folder would come to lie in itself.
+    const auto found = statusAt(from, name);
+    if (!found)
+        return found.error;
+    return S_ISDIR(found->st_mode) ? renameFolderByClaim(from, name, to, newName)
+                                   : renameByLink(from, name, to, newName);
 }
 
 SystemResult<FileDescriptor> openOwnFolder(const std::string& path)
 {
-    if (::mkdir(path.c_str(), S_IRWXU) != 0 && errno != EEXIST)
-        return SystemError::last(path);
-    FileDescriptor folder(::open(path.c_str(), O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
+    constexpr int flags = O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC;
+    FileDescriptor folder(::open(path.c_str(), flags));
+    if (!folder && errno == ENOENT) {
+        if (::mkdir(path.c_str(), S_IRWXU) != 0 && errno != EEXIST)
+            return SystemError::last(path);
+        folder = FileDescriptor(::open(path.c_str(), flags));
+    }
     if (!folder)
         return SystemError::last(path);
     return folder;
 }
 
-bool isProcessGone(const std::string& uniqueName)
+bool isReservedName(std::string_view name)
 {
-    int process = 0;
-    const char* begin = uniqueName.data() + uniqueName.find('-') + 1;
-    std::from_chars(begin, uniqueName.data() + uniqueName.size(), process, 16);
-    return process > 0 && ::kill(process, 0) != 0 && errno == ESRCH;
+    return name.starts_with(host::system::passingPrefix) || PromiseRecord::itemPathFor(name);
+}
+
+Error reservedName(const std::string& path)
+{
+    auto sentence = platform::formatText(
+        host::system::translated("The name “%@” can’t be used, because the drive needs it for itself."),
+        {host::system::displayName(path)});
+    return Error(platform::FileErrorCode::InvalidName,
+        {{std::string(platform::errorKey::filePath), path},
+            {std::string(platform::errorKey::localizedDescription), std::move(sentence)}});
 }
 
 } // namespace host::drive

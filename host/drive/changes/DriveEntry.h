@@ -62,15 +62,25 @@ using host::system::versionOf;
 /// status change time, which is not compared.
 bool isSameContent(const platform::ItemVersion& a, const platform::ItemVersion& b);
 
+/// Answers whether both are the status of one file.
+inline bool isSameFile(const struct stat& a, const struct stat& b)
+{
+    return a.st_dev == b.st_dev && a.st_ino == b.st_ino;
+}
 /// Answers the status of a name in an open folder, without following a link.
 host::system::SystemResult<struct stat> statusAt(
     const host::system::FileDescriptor& folder, const std::string& name);
-/// Renames an item and never replaces one (EEXIST).
+/// Renames an item and never replaces one (EEXIST). Where the file system cannot rename in this way, a name
+/// is claimed first: a file's by a link, a folder's by an empty folder. EOPNOTSUPP means that it cannot do
+/// that either.
 host::system::SystemError renameEntry(const host::system::FileDescriptor& from, const std::string& name,
     const host::system::FileDescriptor& to, const std::string& newName);
 /// Opens one of the drive's private folders, and makes it when it is missing. Only the user may enter it.
 host::system::SystemResult<host::system::FileDescriptor> openOwnFolder(const std::string& path);
-/// Answers whether the process that made such a name (see uniqueName()) is known to have ended.
-bool isProcessGone(const std::string& uniqueName);
+/// Answers whether a name has a meaning of its own in the drive, so that an item with it would not be seen:
+/// the private names of work that is under way, and those of promises.
+bool isReservedName(std::string_view name);
+/// Answers the error for a location with such a name: FileErrorCode::InvalidName.
+platform::Error reservedName(const std::string& path);
 
 } // namespace host::drive

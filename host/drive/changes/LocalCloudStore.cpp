@@ -5,12 +5,10 @@
 
 #include "host/drive/changes/TreeCopy.h"
 #include "host/drive/records/SmallFile.h"
-#include "host/system/files/DirectoryReader.h"
 
 #include <fcntl.h>
 
 #include <cerrno>
-#include <memory>
 
 namespace host::drive {
 
@@ -27,6 +25,14 @@ bool isPlainName(const std::string& name)
         && name.find_first_of(std::string_view("/\0", 2)) == std::string::npos;
 }
 
+SystemResult<FileDescriptor> openStore(const std::string& path)
+{
+    FileDescriptor folder(::open(path.c_str(), O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
+    if (!folder)
+        return SystemError::last(path);
+    return folder;
+}
+
 /// Answers ECANCELED when the file that was moved into the store is another version.
 SystemError checkStored(const FileDescriptor& folder, const std::string& content, const ItemVersion& version)
 {
@@ -38,27 +44,22 @@ SystemError checkStored(const FileDescriptor& folder, const std::string& content
 
 } // namespace
 
-SystemResult<FileDescriptor> LocalCloudStore::openFolder() const
-{
-    const auto path = _layout.cloud();
-    FileDescriptor folder(::open(path.c_str(), O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
-    if (!folder)
-        return SystemError::last(path);
-    return folder;
-}
-
 SystemResult<FileDescriptor> LocalCloudStore::openContent(const std::string& content) const
 {
     if (!isPlainName(content))
         return SystemError(ENOENT, content);
-    const auto folder = openFolder();
-    if (!folder)
-        return folder.error;
-    constexpr int flags = O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC;
-    FileDescriptor file(::openat(folder->get(), content.c_str(), flags));
-    if (!file)
-        return SystemError::last(content);
-    return file;
+    SystemError failure(ENOENT, content);
+    for (const auto& path : {_layout.cloud(), _layout.released()}) {
+        const auto folder = openStore(path);
+        constexpr int flags = O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC;
+        FileDescriptor file(folder ? ::openat(folder->get(), content.c_str(), flags) : -1);
+        if (file)
+            return file;
+        failure = folder ? SystemError::last(content) : folder.error;
+        if (!failure.is(ENOENT))
+            break;
+    }
+    return failure;
 }
 
 SystemError LocalCloudStore::fetch(
@@ -97,54 +98,34 @@ SystemError LocalCloudStore::store(
     return failure;
 }
 
-SystemError LocalCloudStore::remove(const std::string& content)
+SystemError LocalCloudStore::release(const std::string& content)
 {
     if (!isPlainName(content))
         return {};
-    const auto folder = openFolder();
+    const auto folder = openStore(_layout.cloud());
     if (!folder)
         return folder.error.is(ENOENT) ? SystemError() : folder.error;
-    const bool isGone = ::unlinkat(folder->get(), content.c_str(), 0) == 0 || errno == ENOENT;
-    return SystemError::unless(isGone, content);
+    const auto released = openOwnFolder(_layout.released());
+    const auto failure = released ? renameEntry(*folder, content, *released, content) : released.error;
+    // A content on another storage stays where it is, and shows as a content without a promise.
+    const bool isDone = !failure || failure.is(ENOENT) || failure.is(EEXIST) || failure.is(EXDEV);
+    if (isDone)
+        _released();
+    return isDone ? SystemError() : failure;
 }
 
-SystemError LocalCloudStore::move(const std::string& content, const std::string& newContent)
+std::optional<bool> LocalCloudStore::has(const std::string& content)
 {
-    if (!isPlainName(content) || !isPlainName(newContent))
-        return {ENOENT, content};
-    const auto folder = openFolder();
-    if (!folder)
-        return folder.error;
-    return renameEntry(*folder, content, *folder, newContent);
+    const auto file = openContent(content);
+    if (file)
+        return true;
+    return file.error.is(ENOENT) ? std::optional(false) : std::nullopt;
 }
 
 bool LocalCloudStore::holdsOtherThan(const std::string& content, const FileDescriptor& document)
 {
     const auto file = openContent(content);
     return file ? static_cast<bool>(compareBytes(*file, document)) : !file.error.is(ENOENT);
-}
-
-platform::Result<std::vector<std::string>> LocalCloudStore::listChanges(platform::Date since)
-{
-    std::vector<std::string> names;
-    const auto folder = system::openFolder(_layout.cloud());
-    if (!folder && !folder.error.is(ENOENT))
-        return itemError(folder.error, _layout.cloud());
-    if (!folder)
-        return names;
-    const auto reader = std::make_unique<system::DirectoryReader>(*folder);
-    while (const auto entry = reader->next()) {
-        struct stat found;
-        // A rename into the folder sets the status change time and leaves the modification time.
-        // The reader's names end with a null character.
-        // NOLINTNEXTLINE(bugprone-suspicious-stringview-data-usage)
-        if (::fstatat(folder->get(), entry->name.data(), &found, AT_SYMLINK_NOFOLLOW) == 0
-            && versionOf(found).changed >= since.nanoseconds)
-            names.emplace_back(entry->name);
-    }
-    if (reader->error())
-        return itemError(reader->error(), _layout.cloud());
-    return names;
 }
 
 platform::Result<StorageSpace> LocalCloudStore::quota()

@@ -15,22 +15,23 @@ public:
         : _layout(std::move(layout))
     {
     }
+    /// Sets what is called after each release, on the releasing thread. It is set before the store is used.
+    void onRelease(std::function<void()> released) { _released = std::move(released); }
 
     system::SystemError fetch(
         const std::string& content, const system::FileDescriptor& into, const Progress& progress) override;
     system::SystemError store(const DriveEntry& document, const platform::ItemVersion& version,
         const std::string& content) override;
-    system::SystemError remove(const std::string& content) override;
-    system::SystemError move(const std::string& content, const std::string& newContent) override;
+    system::SystemError release(const std::string& content) override;
+    std::optional<bool> has(const std::string& content) override;
     bool holdsOtherThan(const std::string& content, const system::FileDescriptor& document) override;
-    platform::Result<std::vector<std::string>> listChanges(platform::Date since) override;
     platform::Result<StorageSpace> quota() override;
 
 private:
-    system::SystemResult<system::FileDescriptor> openFolder() const;
     system::SystemResult<system::FileDescriptor> openContent(const std::string& content) const;
 
     DriveLayout _layout;
+    std::function<void()> _released = [] {};
 };
 
 } // namespace host::drive

@@ -3,10 +3,10 @@
 
 // This file reads a document whose content is to be replaced, and replaces it.
 
+#include "host/drive/changes/ItemTraits.h"
 #include "host/drive/changes/LocalItemChanges.h"
 #include "host/drive/changes/NewFile.h"
-#include "host/drive/changes/TreeCopy.h"
-#include "host/drive/records/ItemFacts.h"
+#include "host/drive/records/ItemMarks.h"
 #include "host/drive/records/SmallFile.h"
 
 #include <fcntl.h>
@@ -94,13 +94,6 @@ SystemError compareContent(const OpenDocument& document, const FileContent& befo
     return *bytes == *before.bytes ? SystemError() : SystemError(ECANCELED, document.entry.name);
 }
 
-/// Copies access rights and attributes of another document.
-SystemError takeOver(const NewFile& file, const OpenDocument& from, std::string_view except)
-{
-    TRW_TRY(copyAttributes(from.file, file.descriptor(), except));
-    return SystemError::unless(::fchmod(file.descriptor().get(), from.found.st_mode & 07777) == 0);
-}
-
 SystemResult<ItemVersion> replaceBytes(const DriveLayout& layout, const OpenDocument& document,
     const FileContent& before, std::string_view content)
 {
@@ -110,8 +103,11 @@ SystemResult<ItemVersion> replaceBytes(const DriveLayout& layout, const OpenDocu
     if (!file)
         return file.error;
     TRW_TRY(file->write(content));
-    TRW_TRY(takeOver(*file, document, {}));
-    return file->replace(layout, document.entry, versionOf(document.found));
+    const auto traits = ItemTraits::read(document.file);
+    if (!traits)
+        return traits.error;
+    TRW_TRY(traits->write(file->descriptor()));
+    return file->replace(layout, document.entry, versionOf(document.found), *traits);
 }
 
 /// Makes a document with the access rights and attributes of another one, if that can be opened.
@@ -123,9 +119,15 @@ SystemError addFile(
     if (!file)
         return file.error;
     TRW_TRY(file->write(content));
-    // The new document is one of its own, so the identifier stays with the other one.
-    if (const auto model = openDocument(layout, like))
-        TRW_TRY(takeOver(*file, *model, itemMark::documentIdentifier));
+    if (const auto model = openDocument(layout, like)) {
+        auto traits = ItemTraits::read(model->file);
+        if (!traits)
+            return traits.error;
+        // The new document is one of its own, so the identifier and its day stay with the other one.
+        traits->attributes.erase(itemMark::documentIdentifier);
+        traits->attributes.erase(itemMark::created);
+        TRW_TRY(traits->write(file->descriptor()));
+    }
     return file->publish(entry, entry.name);
 }
 
@@ -173,6 +175,8 @@ std::optional<Error> LocalItemChanges::addDocument(
     const auto entry = DriveEntry::open(_layout, path);
     if (!entry)
         return entry.error;
+    if (isReservedName(entry.value->name))
+        return reservedName(path);
     const auto failure = addFile(_layout, *entry, like, content);
     return failure ? std::optional(itemError(failure, path)) : std::nullopt;
 }

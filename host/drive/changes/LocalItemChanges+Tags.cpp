@@ -4,10 +4,9 @@
 // This file changes the tags of items and of promises.
 
 #include "host/drive/changes/LocalItemChanges.h"
-#include "host/drive/changes/NewFile.h"
-#include "host/drive/records/ItemFacts.h"
+#include "host/drive/changes/Promises.h"
+#include "host/drive/records/ItemMarks.h"
 #include "host/drive/records/SmallFile.h"
-#include "host/system/files/ItemPaths.h"
 
 #include <fcntl.h>
 
@@ -31,9 +30,8 @@ using Tags = std::vector<std::string>;
 SystemError checkIsStillThere(const FileDescriptor& file)
 {
     struct stat now;
-    if (::fstat(file.get(), &now) != 0)
-        return SystemError::last();
-    return now.st_nlink == 0 ? SystemError(ECANCELED) : SystemError();
+    const bool isReplaced = ::fstat(file.get(), &now) == 0 && now.st_nlink == 0;
+    return isReplaced ? SystemError(ECANCELED) : SystemError();
 }
 
 /// Answers the tags that an item shall have. A tag that cannot be kept is EINVAL.
@@ -49,60 +47,47 @@ SystemResult<Tags> edited(const Tags& before, const platform::FileChanges::TagEd
     return tags;
 }
 
-SystemResult<Tags> editItem(const DriveEntry& entry, const platform::FileChanges::TagEdit& edit)
+/// An open item, or an open promise, and the tags that it has.
+struct TaggedItem {
+    FileDescriptor file;
+    Tags tags;
+    WithoutTags without = WithoutTags::NoAttribute;
+};
+
+SystemResult<TaggedItem> openItem(const DriveEntry& entry)
 {
     // The item stays open, so a new name does not lead to another item.
-    const FileDescriptor file(
-        ::openat(entry.folder.get(), entry.name.c_str(), O_PATH | O_NOFOLLOW | O_CLOEXEC));
+    FileDescriptor file(::openat(entry.folder.get(), entry.name.c_str(), O_PATH | O_NOFOLLOW | O_CLOEXEC));
     struct stat found;
     if (!file || ::fstat(file.get(), &found) != 0)
         return SystemError::last();
     if (!S_ISREG(found.st_mode) && !S_ISDIR(found.st_mode))
         return SystemError(ENOTSUP);
-    auto before = tagsOf(file);
-    const auto tags = edited(before, edit);
-    if (!tags)
-        return tags.error;
-    if (*tags == before)
-        return before;
-    TRW_TRY(writeTags(file, *tags));
-    TRW_TRY(checkIsStillThere(file));
-    return before;
+    auto tags = splitTags(AttributeReader(file).value(itemMark::tags).value_or(std::string()));
+    return TaggedItem{std::move(file), std::move(tags)};
 }
 
-SystemResult<Tags> editPromise(
-    const DriveLayout& layout, const DriveEntry& entry, const platform::FileChanges::TagEdit& edit)
+SystemResult<TaggedItem> openTaggedPromise(const DriveEntry& entry)
 {
-    const auto name = entry.promiseName();
-    constexpr int flags = O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC;
-    const FileDescriptor file(::openat(entry.folder.get(), name.c_str(), flags));
-    struct stat found;
-    if (!file || ::fstat(file.get(), &found) != 0)
-        return SystemError::last();
-    const auto text = readSmallFile(file, entry.path, PromiseRecord::maximumFileSize);
-    auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
+    auto promise = OpenPromise::open(entry);
     if (!promise)
-        return SystemError(EBADMSG);
-    auto before = promise->tags;
-    auto tags = edited(before, edit);
+        return promise.error;
+    return TaggedItem{std::move(promise->file), std::move(promise->record.tags), WithoutTags::EmptyAttribute};
+}
+
+SystemResult<Tags> editItem(const LocatedItem& located, const platform::FileChanges::TagEdit& edit)
+{
+    auto item = located.isPromise() ? openTaggedPromise(located.entry) : openItem(located.entry);
+    if (!item)
+        return item.error;
+    const auto tags = edited(item->tags, edit);
     if (!tags)
         return tags.error;
-    if (*tags == before)
-        return before;
-    promise->tags = std::move(*tags);
-    const auto changed = promise->toJson();
-    if (changed.size() > PromiseRecord::maximumFileSize)
-        return SystemError(E2BIG);
-    const DriveEntry place{FileDescriptor(::fcntl(entry.folder.get(), F_DUPFD_CLOEXEC, 0)), name,
-        system::siblingPath(entry.path, name)};
-    auto fresh = NewFile::create(layout, place);
-    if (!fresh)
-        return fresh.error;
-    TRW_TRY(fresh->write(changed));
-    TRW_TRY(SystemError::unless(::fchmod(fresh->descriptor().get(), found.st_mode & 07777) == 0));
-    if (const auto replaced = fresh->replace(layout, place, versionOf(found)); !replaced)
-        return replaced.error;
-    return before;
+    if (*tags == item->tags)
+        return std::move(item->tags);
+    TRW_TRY(writeTags(item->file, *tags, item->without));
+    TRW_TRY(checkIsStillThere(item->file));
+    return std::move(item->tags);
 }
 
 /// Answers whether another program has changed the item between two steps, so that a new attempt may succeed.
@@ -117,8 +102,6 @@ Error tagError(const SystemError& failure, const std::string& path)
         return Error(FileErrorCode::InvalidName);
     if (failure.is(ENOTSUP) || failure.is(EPERM))
         return Error(FileErrorCode::Unsupported);
-    if (failure.is(EBADMSG))
-        return damagedRecord(path, "its promise is no JSON object");
     return itemError(isWorthAnotherTry(failure) ? SystemError(EBUSY) : failure, path);
 }
 
@@ -132,8 +115,7 @@ Result<Tags> LocalItemChanges::editTags(const std::string& path, const TagEdit& 
         const auto item = LocatedItem::locate(_layout, path);
         if (!item)
             return *item.error;
-        auto before =
-            item->isPromise() ? editPromise(_layout, item->entry, edit) : editItem(item->entry, edit);
+        auto before = editItem(*item.value, edit);
         if (before)
             return std::move(*before);
         failure = before.error;

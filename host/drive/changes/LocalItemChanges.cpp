@@ -3,9 +3,11 @@
 
 #include "host/drive/changes/LocalItemChanges.h"
 
+#include "host/drive/changes/CloudStore.h"
 #include "host/drive/changes/HeldItem.h"
+#include "host/drive/changes/ItemTraits.h"
 #include "host/drive/changes/NewFile.h"
-#include "host/drive/changes/PromiseFile.h"
+#include "host/drive/changes/Promises.h"
 #include "host/drive/changes/TreeCopy.h"
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/ItemFacts.h"
@@ -14,6 +16,7 @@
 #include "host/system/files/ItemPaths.h"
 #include "host/system/files/SystemErrors.h"
 #include "host/system/texts/Translate.h"
+#include "platform/Log.h"
 
 #include <fcntl.h>
 
@@ -31,13 +34,16 @@ using platform::ItemVersion;
 
 namespace {
 
-PromiseRecord promiseFor(const ItemFacts& facts, const std::string& content)
+/// With it the short form of a promise fits into the inode of its file.
+constexpr const char* contentPrefix = "c-";
+
+PromiseRecord promiseFor(const FileDescriptor& document, const std::string& content)
 {
+    const auto facts = lookAtOpenFile(document);
     PromiseRecord promise;
     promise.size = facts.status.stx_size;
     promise.modified = facts.modified();
-    if (facts.status.stx_mask & STATX_BTIME)
-        promise.created = system::dateOf(facts.status.stx_btime);
+    promise.created = facts.created();
     promise.shared = facts.marks.shared;
     promise.role = facts.marks.role;
     promise.extensionHidden = facts.marks.extensionHidden;
@@ -93,6 +99,8 @@ std::optional<Error> makeFolder(
     auto entry = DriveEntry::open(layout, path);
     if (!entry)
         return entry.error;
+    if (isReservedName(entry.value->name))
+        return reservedName(path);
     auto failure = entry->checkIsFree();
     if (!failure)
         failure = SystemError::unless(::mkdirat(entry->folder.get(), entry->name.c_str(), 0777) == 0, path);
@@ -151,7 +159,7 @@ std::optional<Error> LocalItemChanges::removeItem(
     if (unchangedSince && versionOf(item->found) != *unchangedSince)
         return Error(FileErrorCode::Cancelled);
     if (!item->isPromise())
-        dropRedundantPromise(item->entry, *_store);
+        static_cast<void>(settleTwin(_layout, item->entry, *_store));
     const auto failure = removeLocated(*item);
     return failure ? std::optional(changeError(failure, path)) : std::nullopt;
 }
@@ -178,19 +186,21 @@ std::optional<Error> LocalItemChanges::moveItem(const std::string& from, const s
     const auto target = DriveEntry::open(_layout, to);
     if (!source || !target)
         return source ? target.error : source.error;
+    if (isReservedName(target.value->name))
+        return reservedName(to);
     if (to.starts_with(from + '/'))
         return intoItself(from, to);
     if (const auto failure = target->checkIsFree())
         return systemError(failure, from, to);
     if (!source->isPromise())
-        dropRedundantPromise(source->entry, *_store);
+        static_cast<void>(settleTwin(_layout, source->entry, *_store));
     const auto newName = source->isPromise() ? target->promiseName() : target->name;
     auto failure = moveWithin(*source, *target, newName);
     if (failure.is(EXDEV))
         failure = moveAcross(*source, *target, newName);
     // The kernel answers EINVAL when the target lies inside the source, which a mount can hide from the
     // paths.
-    if (failure.is(ownFolder) || failure.is(EINVAL))
+    if (failure.is(ownFolder) || (failure.is(EINVAL) && S_ISDIR(source->found.st_mode)))
         return intoItself(from, to);
     if (failure)
         return failure.is(changedMeanwhile) ? changeError(failure, from) : systemError(failure, from, to);
@@ -271,28 +281,42 @@ std::optional<Error> LocalItemChanges::evictItem(const std::string& path)
         return item.error;
     if (!S_ISREG(item->found.st_mode))
         return Error(FileErrorCode::Unsupported);
-    dropRedundantPromise(item->entry, *_store);
-    const auto failure = replaceByPromise(*item);
+    auto failure = settleTwin(_layout, item->entry, *_store);
+    if (!failure)
+        failure = replaceByPromise(*item);
     return failure ? std::optional(changeError(failure, path)) : std::nullopt;
 }
 
 SystemError LocalItemChanges::replaceByPromise(const LocatedItem& item)
 {
+    static constexpr platform::Operation op{"-[LocalItemChanges replaceByPromise:]"};
     const auto& entry = item.entry;
-    const auto content = uniqueName("content-");
-    const auto promise = promiseFor(lookAtFile(descriptorPath(entry.folder) + '/' + entry.name), content);
-    auto file = NewFile::create(_layout, entry);
+    const FileDescriptor document(::openat(
+        entry.folder.get(), entry.name.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
+    const auto traits = document ? ItemTraits::read(document) : SystemError::last(entry.name);
+    if (!traits)
+        return traits.error;
+    const auto content = uniqueName(contentPrefix);
+    auto file = NewFile::create(_layout, entry, content);
     if (!file)
         return file.error;
-    TRW_TRY(file->write(promise.toJson()));
+    TRW_TRY(writePromise(file->descriptor(), promiseFor(document, content)));
+    TRW_TRY(traits->write(file->descriptor()));
     // While both exist the document counts. It is removed only when its promise is safe on the disk.
     TRW_TRY(file->publish(entry, entry.promiseName()));
     auto failure = _store->store(entry, versionOf(item.found), content);
-    if (failure && entry.status())
-        dropRedundantPromise(entry, *_store);
-    // The removal of the document's name needs no sync. If it came back after a power cut, it would only hide
-    // its promise.
-    return failure;
+    if (failure) {
+        // A promise that cannot be taken back is taken back by the next start.
+        if (withdrawPromise(_layout, entry, *_store, content))
+            file->keepRecord();
+        return failure;
+    }
+    // The document's name needs no sync. If it came back after a power cut, it would only hide its promise.
+    const auto now = ItemTraits::read(document);
+    const auto missed = now ? now->writeChanges(*traits, file->descriptor()) : now.error;
+    if (missed)
+        op.warning("Cannot give the promise of %@ what has changed meanwhile: %@", entry.path, missed);
+    return {};
 }
 
 } // namespace host::drive

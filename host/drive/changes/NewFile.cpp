@@ -30,11 +30,13 @@ NewFile::~NewFile()
         ::unlinkat(_folder.get(), _name.c_str(), 0);
 }
 
-SystemResult<NewFile> NewFile::create(const DriveLayout& layout, const DriveEntry& entry)
+SystemResult<NewFile> NewFile::create(
+    const DriveLayout& layout, const DriveEntry& entry, const std::string& content)
 {
     NewFile fresh;
     const auto name = uniqueName(WorkRecord::temporaryPrefix);
-    auto record = WorkRecord::write(layout, {entry.path, system::siblingPath(entry.path, name), {}});
+    auto record =
+        WorkRecord::write(layout, {entry.path, system::siblingPath(entry.path, name), {}, content, {}, {}});
     if (!record)
         return record.error;
     fresh._record.emplace(std::move(*record));
@@ -65,10 +67,16 @@ SystemError NewFile::publish(const DriveEntry& entry, const std::string& name)
 }
 
 /// The exchanged file under this name is kept after a kill, because it may hold the save of another program.
-SystemError NewFile::takeHeldName(const DriveLayout& layout, const DriveEntry& entry)
+SystemError NewFile::takeHeldName(
+    const DriveLayout& layout, const DriveEntry& entry, const ItemVersion& expected)
 {
     auto held = uniqueName(WorkRecord::heldPrefix);
-    auto record = WorkRecord::write(layout, {entry.path, system::siblingPath(entry.path, held), {}});
+    struct stat own;
+    if (::fstat(_file.get(), &own) != 0)
+        return SystemError::last(_name);
+    auto record = WorkRecord::write(layout,
+        {entry.path, system::siblingPath(entry.path, held), {}, {}, WorkRecord::versionText(expected),
+            WorkRecord::versionText(versionOf(own))});
     if (!record)
         return record.error;
     TRW_TRY(renameEntry(_folder, _name, _folder, held));
@@ -81,47 +89,87 @@ SystemError NewFile::exchange(const DriveEntry& entry) const
 {
     const int done =
         ::renameat2(_folder.get(), _name.c_str(), entry.folder.get(), entry.name.c_str(), RENAME_EXCHANGE);
-    return SystemError::unless(done == 0, entry.name);
+    // A file system that cannot exchange two names answers EINVAL, which elsewhere means a bad name.
+    return done != 0 && errno == EINVAL ? SystemError(EOPNOTSUPP, entry.name)
+                                        : SystemError::unless(done == 0, entry.name);
 }
 
 bool NewFile::isUnderPrivateName() const
 {
-    struct stat own, found;
-    return ::fstat(_file.get(), &own) == 0
-        && ::fstatat(_folder.get(), _name.c_str(), &found, AT_SYMLINK_NOFOLLOW) == 0
-        && own.st_dev == found.st_dev && own.st_ino == found.st_ino;
+    struct stat own;
+    const auto found = statusAt(_folder, _name);
+    return found && ::fstat(_file.get(), &own) == 0 && isSameFile(own, *found);
 }
 
-SystemResult<ItemVersion> NewFile::checkExchanged(const ItemVersion& expected) const
+/// Answers this file's version when the replaced file is the expected one, else ECANCELED.
+SystemResult<ItemVersion> NewFile::finishExchange(
+    const DriveEntry& entry, const ItemVersion& expected, const ItemTraits& traits) const
 {
+    // The replaced file is checked after the exchange, because only then can no other program replace it.
     const auto found = statusAt(_folder, _name);
     if (!found)
         return found.error;
+    if (!isSameContent(versionOf(*found), expected))
+        return SystemError(ECANCELED, _name);
+    TRW_TRY(adoptChanges(traits));
+    TRW_TRY(syncFolder(entry.folder));
     struct stat own;
     if (::fstat(_file.get(), &own) != 0)
         return SystemError::last(_name);
-    if (!isSameContent(versionOf(*found), expected))
-        return SystemError(ECANCELED, _name);
     return versionOf(own);
 }
 
+/// Gives this file the tags, the identifier and the access that the replaced one got since it was read.
+SystemError NewFile::adoptChanges(const ItemTraits& traits) const
+{
+    const FileDescriptor replaced(
+        ::openat(_folder.get(), _name.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
+    const auto now = replaced ? ItemTraits::read(replaced) : SystemError::last(_name);
+    return now ? now->writeChanges(traits, _file) : now.error;
+}
+
+/// Exchanges the names until what comes out is what was put there last. Then nobody has saved in between, and
+/// the newest version has the name.
+void NewFile::exchangeBack(const DriveEntry& entry) const
+{
+    constexpr int mostExchanges = 64;
+    const auto openPrivate = [&] {
+        return FileDescriptor(::openat(_folder.get(), _name.c_str(), O_PATH | O_NOFOLLOW | O_CLOEXEC));
+    };
+    // Each file stays open while it is compared, because a new file could get the inode of a removed one.
+    FileDescriptor lastPut(::fcntl(_file.get(), F_DUPFD_CLOEXEC, 0));
+    for (int exchanges = 0; exchanges < mostExchanges; ++exchanges) {
+        auto put = openPrivate();
+        if (const auto failure = exchange(entry)) {
+            // Another program removed the document, so the name is free for the version that it has not seen.
+            if (failure.is(ENOENT))
+                static_cast<void>(renameEntry(_folder, _name, entry.folder, entry.name));
+            return;
+        }
+        const auto out = openPrivate();
+        struct stat last, came;
+        const bool isKnown = ::fstat(lastPut.get(), &last) == 0 && ::fstat(out.get(), &came) == 0;
+        if (!isKnown || isSameFile(last, came))
+            return;
+        lastPut = std::move(put);
+    }
+}
+
 SystemResult<ItemVersion> NewFile::replace(
-    const DriveLayout& layout, const DriveEntry& entry, const ItemVersion& expected)
+    const DriveLayout& layout, const DriveEntry& entry, const ItemVersion& expected, const ItemTraits& traits)
 {
     if (::fsync(_file.get()) != 0)
         return SystemError::last(_name);
-    TRW_TRY(takeHeldName(layout, entry));
+    TRW_TRY(takeHeldName(layout, entry, expected));
     TRW_TRY(exchange(entry));
-    // The replaced file is checked after the exchange, because only then can no other program replace it.
-    auto written = checkExchanged(expected);
-    const auto failure = written ? syncFolder(entry.folder) : written.error;
-    const bool isKnown = !failure || (!exchange(entry) && isUnderPrivateName());
+    const auto written = finishExchange(entry, expected, traits);
+    if (!written)
+        exchangeBack(entry);
+    const bool isKnown = written || isUnderPrivateName();
     // A file that could not be checked or removed is left to the next start.
     if (!isKnown || ::unlinkat(_folder.get(), _name.c_str(), 0) != 0)
         _record->keep();
     _name.clear();
-    if (failure)
-        return failure;
     return written;
 }
 

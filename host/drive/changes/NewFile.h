@@ -4,6 +4,7 @@
 #pragma once
 
 #include "host/drive/changes/DriveEntry.h"
+#include "host/drive/changes/ItemTraits.h"
 #include "host/drive/changes/WorkRecord.h"
 
 #include <optional>
@@ -14,13 +15,19 @@ namespace host::drive {
 /// A file that is being written in its final folder, under a private name until it is whole. A file that is
 /// not published is removed by the destructor, or at the next start if the process was killed.
 ///
-/// It replaces a document by exchanging the two names in one step and comparing the old document with the
-/// expected version. When another program has saved meanwhile, the names are exchanged back, and nothing has
-/// changed.
+/// It replaces a document by exchanging the two names in one step and comparing what comes out with the
+/// expected version. When another program has saved meanwhile, the names are exchanged back, as often as yet
+/// another version comes out, so that the newest one has the name in the end.
 class NewFile {
 public:
     /// Creates the empty file beside an entry.
-    static system::SystemResult<NewFile> create(const DriveLayout& layout, const DriveEntry& entry);
+    static system::SystemResult<NewFile> create(const DriveLayout& layout, const DriveEntry& entry)
+    {
+        return create(layout, entry, {});
+    }
+    /// Creates the promise of a document that is evicted, whose content gets this name.
+    static system::SystemResult<NewFile> create(
+        const DriveLayout& layout, const DriveEntry& entry, const std::string& content);
 
     NewFile(NewFile&& other) noexcept;
     NewFile& operator=(NewFile&&) = delete;
@@ -32,18 +39,24 @@ public:
     /// Syncs the file and gives it its name. It never replaces a file (EEXIST). The record for the next start
     /// stays until the end.
     system::SystemError publish(const DriveEntry& entry, const std::string& name);
-    /// Syncs the file and gives it the name of the `expected` version, which is removed for good. Answers the
-    /// new version, or ECANCELED when another version had taken the name; after a failure nothing has
-    /// changed. After a kill in between both files exist, one of them in the trash.
-    system::SystemResult<platform::ItemVersion> replace(
-        const DriveLayout& layout, const DriveEntry& entry, const platform::ItemVersion& expected);
+    /// Syncs the file and gives it the name of the `expected` version, which is removed for good. What became
+    /// of that version's traits since it had `traits` is done to this file, too. Answers the new version, or
+    /// ECANCELED when another version had taken the name, which it has then again. A version that nobody
+    /// asked for is kept under a private name, and is in the trash after the next start.
+    system::SystemResult<platform::ItemVersion> replace(const DriveLayout& layout, const DriveEntry& entry,
+        const platform::ItemVersion& expected, const ItemTraits& traits);
+    /// Leaves the record for the next start, which settles what is at the entry then.
+    void keepRecord() { _record->keep(); }
 
 private:
     NewFile() = default;
-    system::SystemError takeHeldName(const DriveLayout& layout, const DriveEntry& entry);
+    system::SystemError takeHeldName(
+        const DriveLayout& layout, const DriveEntry& entry, const platform::ItemVersion& expected);
     system::SystemError exchange(const DriveEntry& entry) const;
-    /// Answers this file's version when the replaced file is `expected`, else ECANCELED.
-    system::SystemResult<platform::ItemVersion> checkExchanged(const platform::ItemVersion& expected) const;
+    system::SystemResult<platform::ItemVersion> finishExchange(
+        const DriveEntry& entry, const platform::ItemVersion& expected, const ItemTraits& traits) const;
+    system::SystemError adoptChanges(const ItemTraits& traits) const;
+    void exchangeBack(const DriveEntry& entry) const;
     bool isUnderPrivateName() const;
 
     std::optional<WorkRecord> _record;

@@ -4,8 +4,10 @@
 #include "host/drive/changes/TreeCopy.h"
 
 #include "host/drive/changes/DriveEntry.h"
+#include "host/drive/changes/ItemTraits.h"
 #include "host/drive/changes/TreeWalk.h"
 #include "host/drive/records/BeneathRoot.h"
+#include "host/drive/records/ItemMarks.h"
 #include "host/system/files/AtomicWrite.h"
 
 #include <fcntl.h>
@@ -34,24 +36,34 @@ FileDescriptor openForReading(const FileDescriptor& folder, const std::string& n
     return FileDescriptor(::openat(folder.get(), name.c_str(), O_RDONLY | openFlags));
 }
 
-SystemResult<std::string> readAttribute(const FileDescriptor& file, const char* name)
+/// Copies the attributes that make a file a promise; ItemTraits leaves these out.
+SystemError copyPromise(const FileDescriptor& from, const FileDescriptor& to)
 {
-    std::string value(64 * 1024, '\0'); // the kernel's own limit
-    const auto length = ::fgetxattr(file.get(), name, value.data(), value.size());
-    if (length < 0)
-        return SystemError::last(name);
-    value.resize(static_cast<std::size_t>(length));
-    return value;
+    const AttributeReader attributes(from);
+    for (const char* name : {itemMark::promise, itemMark::type}) {
+        const auto value = attributes.value(name);
+        if (value && ::fsetxattr(to.get(), name, value->data(), value->size(), 0) != 0)
+            return SystemError::last(name);
+    }
+    return {};
 }
 
-/// Finishes a copy: copies attributes, access rights and dates, and syncs the file.
+/// Finishes a copy: copies traits and dates, and syncs the file.
 SystemError finish(const FileDescriptor& from, const FileDescriptor& to, const struct stat& status)
 {
-    TRW_TRY(copyAttributes(from, to));
+    const auto traits = ItemTraits::read(from);
+    if (!traits)
+        return traits.error;
+    TRW_TRY(traits->write(to));
+    TRW_TRY(copyPromise(from, to));
     const timespec times[] = {status.st_atim, status.st_mtim};
-    const bool isDone = ::fchmod(to.get(), status.st_mode & 07777) == 0 && ::futimens(to.get(), times) == 0
-        && ::fsync(to.get()) == 0;
-    return SystemError::unless(isDone);
+    return SystemError::unless(::futimens(to.get(), times) == 0 && ::fsync(to.get()) == 0);
+}
+
+/// Answers whether two files hold the same promise, or none.
+bool isSamePromise(const FileDescriptor& a, const FileDescriptor& b)
+{
+    return AttributeReader(a).value(itemMark::promise) == AttributeReader(b).value(itemMark::promise);
 }
 
 using Piece = std::array<char, 64 * 1024>;
@@ -186,29 +198,10 @@ bool isSameItem(const Pair& pair, int level)
         return isSameLink(pair);
     const auto a = openForReading(pair.folder, pair.name),
                b = openForReading(pair.otherFolder, pair.otherName);
-    return S_ISREG(found->st_mode) && a && b && !compareBytes(a, b);
+    return S_ISREG(found->st_mode) && a && b && isSamePromise(a, b) && !compareBytes(a, b);
 }
 
 } // namespace
-
-SystemError copyAttributes(const FileDescriptor& from, const FileDescriptor& to, std::string_view except)
-{
-    std::string names(64 * 1024, '\0');
-    const auto length = ::flistxattr(from.get(), names.data(), names.size());
-    if (length < 0)
-        return SystemError::unless(errno == EOPNOTSUPP);
-    for (const char* name = names.data(); name < names.data() + length;
-         name += std::char_traits<char>::length(name) + 1) {
-        if (!std::string_view(name).starts_with("user.") || name == except)
-            continue;
-        const auto value = readAttribute(from, name);
-        if (!value)
-            return value.error;
-        if (::fsetxattr(to.get(), name, value->data(), value->size(), 0) != 0)
-            return SystemError::last(name);
-    }
-    return {};
-}
 
 SystemError copyBytes(const FileDescriptor& from, const FileDescriptor& to,
     const std::function<SystemError(std::uint64_t)>& copied)

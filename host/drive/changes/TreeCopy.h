@@ -13,16 +13,12 @@
 
 namespace host::drive {
 
-/// Copies an item under a new name, a folder with everything in it: contents, links as links, access rights,
-/// user attributes and modification dates. Every file is synced and compared with its original. Errors:
+/// Copies an item under a new name, a folder with everything in it: contents, links as links, traits
+/// (ItemTraits) and modification dates. Every file is synced and compared with its original. Errors:
 /// EOPNOTSUPP for anything but files, folders and links, ELOOP below 128 levels, EBUSY for a mount in a
 /// folder.
 system::SystemError copyTree(const system::FileDescriptor& folder, const std::string& name,
     const system::FileDescriptor& target, const std::string& newName);
-
-/// Copies the user attributes of a file, except one of this name.
-system::SystemError copyAttributes(
-    const system::FileDescriptor& from, const system::FileDescriptor& to, std::string_view except = {});
 
 /// Answers whether two items, folders with everything in them, hold the same names, contents and links.
 /// Attributes and dates are not compared. An item that cannot be read counts as different.

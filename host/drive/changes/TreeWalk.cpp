@@ -25,13 +25,14 @@ namespace {
 /// Walks through a folder one level at a time, with two descriptors however deep the folders lie.
 class Walk {
 public:
-    explicit Walk(TreeVisitor& visitor)
+    Walk(TreeVisitor& visitor, Mounts mounts)
         : _visitor(visitor)
+        , _open(mounts == Mounts::Enter ? openFolderAt : openSubfolder)
     {
     }
     SystemError run(const FileDescriptor& parent, const std::string& name)
     {
-        auto folder = openSubfolder(parent, name);
+        auto folder = _open(parent, name);
         if (!folder)
             return folder.error;
         _current = std::move(*folder);
@@ -76,7 +77,7 @@ private:
     }
     SystemError descend()
     {
-        auto below = openSubfolder(_current, _levels.back().subfolders.back());
+        auto below = _open(_current, _levels.back().subfolders.back());
         if (!below)
             return below.error;
         _current = std::move(*below);
@@ -105,6 +106,7 @@ private:
     }
 
     TreeVisitor& _visitor;
+    SystemResult<FileDescriptor> (*_open)(const FileDescriptor&, const std::string&);
     FileDescriptor _current;
     std::vector<Level> _levels;
 };
@@ -159,12 +161,13 @@ SystemResult<std::vector<std::string>> readNames(const FileDescriptor& folder)
     return names;
 }
 
-SystemError walkTree(const FileDescriptor& parent, const std::string& name, TreeVisitor& visitor)
+SystemError walkTree(
+    const FileDescriptor& parent, const std::string& name, TreeVisitor& visitor, Mounts mounts)
 {
     const auto found = statusAt(parent, name);
     if (!found)
         return found.error;
-    return S_ISDIR(found->st_mode) ? Walk(visitor).run(parent, name)
+    return S_ISDIR(found->st_mode) ? Walk(visitor, mounts).run(parent, name)
                                    : visitor.visitItem(parent, name, *found);
 }
 

@@ -38,11 +38,12 @@ public:
     }
 };
 
+/// Says whether a walk enters a mount in a folder, or ends there (EBUSY).
+enum class Mounts : std::uint8_t { Refuse, Enter };
 /// Walks through an item and everything in it, with two descriptors however deep the folders lie. It follows
-/// no link and enters no mount in a folder (EBUSY). ESTALE means that another program moved a folder away
-/// during the walk.
-system::SystemError walkTree(
-    const system::FileDescriptor& parent, const std::string& name, TreeVisitor& visitor);
+/// no link. ESTALE means that another program moved a folder away during the walk.
+system::SystemError walkTree(const system::FileDescriptor& parent, const std::string& name,
+    TreeVisitor& visitor, Mounts mounts = Mounts::Refuse);
 
 /// Answers the names in an open folder. They are read at once, because the folder may change meanwhile.
 system::SystemResult<std::vector<std::string>> readNames(const system::FileDescriptor& folder);

@@ -4,14 +4,19 @@
 #include "host/drive/changes/WorkRecord.h"
 
 #include "host/drive/changes/DriveEntry.h"
+#include "host/drive/records/BeneathRoot.h"
+#include "host/drive/records/ItemMarks.h"
 #include "host/drive/records/SmallFile.h"
 #include "host/system/files/DirectoryReader.h"
 #include "host/system/files/ItemPaths.h"
 
 #include <fcntl.h>
+#include <sys/xattr.h>
 
 #include <cerrno>
+#include <ctime>
 #include <memory>
+#include <vector>
 
 namespace host::drive {
 
@@ -32,21 +37,73 @@ bool lockWhole(const FileDescriptor& file, int command)
     return ::fcntl(file.get(), command, &lock) == 0;
 }
 
+/// Answers the fields, each ended by a NUL, so that a text that was cut is recognised.
 std::string textOf(const WorkRecord::Places& places)
 {
-    // The last NUL shows that the text is whole.
-    return places.item + '\0' + places.working + '\0' + places.copy + '\0';
+    std::string text;
+    for (const auto* field :
+        {&places.item, &places.working, &places.copy, &places.content, &places.replaced, &places.replacing})
+        text.append(*field) += '\0';
+    return text;
 }
 
-/// Answers empty places for a record that was not written whole, because no work had begun then.
+/// Answers empty places for a record that was not written whole, because no work had begun then. Records of
+/// older programs have three fields.
 WorkRecord::Places placesOf(const std::string& text)
 {
-    const auto first = text.find('\0'), second = text.find('\0', first + 1);
-    if (first == std::string::npos || second == std::string::npos || !text.ends_with('\0')
-        || second + 1 == text.size())
+    constexpr std::size_t fewestFields = 3, mostFields = 6;
+    std::vector<std::string> fields;
+    for (std::size_t start = 0; start < text.size();) {
+        const auto end = text.find('\0', start);
+        if (end == std::string::npos)
+            return {};
+        fields.push_back(text.substr(start, end - start));
+        start = end + 1;
+    }
+    if (fields.size() < fewestFields || fields.size() > mostFields)
         return {};
-    return {text.substr(0, first), text.substr(first + 1, second - first - 1),
-        text.substr(second + 1, text.size() - second - 2)};
+    fields.resize(mostFields);
+    return {fields[0], fields[1], fields[2], fields[3], fields[4], fields[5]};
+}
+
+/// Answers a file without a name, so that a record has its text and is locked when others first see it, or
+/// one with the name where the file system has no such files.
+FileDescriptor makeFile(const std::string& path, bool& hasName)
+{
+    FileDescriptor file(::open(system::parentPath(path).c_str(), O_TMPFILE | O_RDWR | O_CLOEXEC, 0600));
+    hasName = !file;
+    if (!file && (errno == EOPNOTSUPP || errno == EISDIR))
+        file = FileDescriptor(::open(path.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0600));
+    return file;
+}
+
+bool writeText(const FileDescriptor& file, const std::string& text)
+{
+    if (::fsetxattr(file.get(), WorkRecord::recordAttribute, text.data(), text.size(), 0) == 0)
+        return true;
+    // An attribute has room for a path or two; longer texts are written, and synced because nothing else
+    // keeps them in order.
+    return !system::writeWhole(file, text) && ::fdatasync(file.get()) == 0;
+}
+
+bool giveName(const FileDescriptor& file, const std::string& path)
+{
+    return ::linkat(AT_FDCWD, descriptorPath(file).c_str(), AT_FDCWD, path.c_str(), AT_SYMLINK_FOLLOW) == 0;
+}
+
+std::string textIn(const FileDescriptor& file, const std::string& path)
+{
+    if (auto text = AttributeReader(file).value(WorkRecord::recordAttribute))
+        return std::move(*text);
+    return readSmallFile(file, path, largestRecord).value.value_or(std::string());
+}
+
+/// Answers whether a file is so old that whoever made it has locked it, or has ended.
+bool isOld(const FileDescriptor& file)
+{
+    constexpr time_t seconds = 10;
+    struct stat found;
+    return ::fstat(file.get(), &found) == 0 && found.st_ctim.tv_sec + seconds < ::time(nullptr);
 }
 
 } // namespace
@@ -68,17 +125,31 @@ SystemResult<WorkRecord> WorkRecord::write(const DriveLayout& layout, const Plac
     if (const auto folder = openOwnFolder(layout.held()); !folder)
         return folder.error;
     const auto isFull = [] { return errno == ENOSPC || errno == EDQUOT; };
-    const auto text = textOf(places);
+    const auto path = (layout.held() + '/').append(system::lastName(places.working)).append(recordSuffix);
     WorkRecord fresh;
-    fresh._path = (layout.held() + '/').append(system::lastName(places.working)).append(recordSuffix);
-    fresh._file = FileDescriptor(::open(fresh._path.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0600));
-    if (!fresh._file && !isFull())
-        return SystemError::last(fresh._path);
-    if (fresh._file && !lockWhole(fresh._file, F_OFD_SETLKW))
-        return SystemError::last(fresh._path);
-    if (fresh._file && ::write(fresh._file.get(), text.data(), text.size()) < 0 && !isFull())
-        return SystemError::last(fresh._path);
+    bool hasName = false;
+    fresh._file = makeFile(path, hasName);
+    if (!fresh._file)
+        return isFull() ? SystemResult<WorkRecord>(std::move(fresh)) : SystemError::last(path);
+    if (hasName)
+        fresh._path = path;
+    if (!lockWhole(fresh._file, F_OFD_SETLKW))
+        return SystemError::last(path);
+    if (!writeText(fresh._file, textOf(places)) && !isFull())
+        return SystemError::last(path);
+    if (!hasName && !giveName(fresh._file, path) && !isFull())
+        return SystemError::last(path);
+    fresh._path = path;
     return fresh;
+}
+
+std::string WorkRecord::versionText(const platform::ItemVersion& version)
+{
+    std::string text;
+    for (const auto number :
+        {version.device, version.inode, version.size, static_cast<std::uint64_t>(version.modified)})
+        text += std::to_string(number) + ' ';
+    return text;
 }
 
 bool WorkRecord::isRecorded(const DriveLayout& layout, const std::string& name)
@@ -101,10 +172,9 @@ void WorkRecord::forEachAbandoned(const DriveLayout& layout, const std::function
         const FileDescriptor file(::open(path.c_str(), O_RDWR | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC));
         if (!file || !lockWhole(file, F_OFD_SETLK))
             continue; // its process still works
+        const auto places = placesOf(textIn(file, path));
         // A record without text may belong to a living process that has not locked it yet.
-        const auto text = readSmallFile(file, path, largestRecord);
-        const auto places = text ? placesOf(*text) : Places{};
-        if (places.working.empty() ? isProcessGone(std::string(entry->name)) : settle(places))
+        if (places.working.empty() ? isOld(file) : settle(places))
             ::unlink(path.c_str());
     }
 }

@@ -6,6 +6,7 @@
 #include "host/drive/records/DriveLayout.h"
 #include "host/system/files/FileDescriptor.h"
 #include "host/system/files/SystemError.h"
+#include "platform/FileChanges.h"
 
 #include <functional>
 #include <string>
@@ -15,14 +16,23 @@ namespace host::drive {
 /// A process writes a record before it gives an item, or a copy of one, a private name, so that the next
 /// start can repair the drive if the process is killed. The destructor removes the record. Until then it is
 /// locked, so that others can tell that its process lives.
+///
+/// The text of a record is an extended attribute (recordAttribute), because journals of file systems keep the
+/// order of names and attributes: after a power cut there is no private name without the text of its record.
+/// What a file holds would have to be synced for that. It holds the text where attributes are impossible.
 class WorkRecord {
 public:
     /// Absolute paths of names on disk. For a promise they are those of its file.
     struct Places {
         std::string item; ///< the item's own place
         std::string working; ///< the private name of the item itself (heldPrefix) or of a copy
-        std::string copy; ///< the place of a whole copy of the item; empty: none
+        std::string copy = {}; ///< the place of a whole copy of the item; empty: none
+        std::string content = {}; ///< the content that an evicted document gets; empty: none
+        /// The versions (versionText()) that a save replaces and puts in its place; empty: none.
+        std::string replaced = {}, replacing = {};
     };
+    static constexpr const char* recordAttribute = "user.trw.work";
+    static std::string versionText(const platform::ItemVersion& version);
 
     /// The prefix of an item that was taken out of its folder and will be put back.
     static constexpr const char* heldPrefix = ".trwheld-";

@@ -6,8 +6,7 @@
 #include "host/drive/changes/WorkRecord.h"
 #include "host/drive/identity/IdentifiedItem.h"
 #include "host/drive/records/ItemFacts.h"
-#include "host/drive/records/PromiseRecord.h"
-#include "host/drive/records/SmallFile.h"
+#include "host/drive/records/PromiseFile.h"
 #include "host/system/files/DeepEnumeration.h"
 #include "host/system/files/FileVersion.h"
 #include "host/system/files/ItemPaths.h"
@@ -51,8 +50,7 @@ bool isInWork(const std::string& path)
 
 std::int64_t birthOfPromise(const std::string& path)
 {
-    const auto text = readSmallFile(path, PromiseRecord::maximumFileSize);
-    const auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
+    const auto promise = readPromise(path);
     return promise && promise->created ? promise->created->nanoseconds : 0;
 }
 

@@ -3,19 +3,14 @@
 
 #include "host/drive/identity/IdentifiedItem.h"
 
-#include "host/drive/changes/DriveEntry.h"
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/ItemFacts.h"
-#include "host/drive/records/PromiseRecord.h"
-#include "host/drive/records/SmallFile.h"
-#include "host/system/files/AtomicWrite.h"
+#include "host/drive/records/PromiseFile.h"
 
 #include <fcntl.h>
 #include <sys/xattr.h>
 
-#include <array>
 #include <cerrno>
-#include <climits>
 
 namespace host::drive {
 
@@ -29,22 +24,6 @@ namespace {
 platform::Error failed(int errorNumber)
 {
     return {platform::errorDomain::system, errorNumber};
-}
-
-std::uint32_t identifierInPromise(const Result<std::string>& text)
-{
-    const auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
-    return promise ? promise->documentIdentifier : 0;
-}
-
-std::string pathOf(const FileDescriptor& file)
-{
-    std::array<char, PATH_MAX> buffer;
-    const auto length = ::readlink(descriptorPath(file).c_str(), buffer.data(), buffer.size());
-    if (length == static_cast<ssize_t>(buffer.size()))
-        errno = ENAMETOOLONG;
-    const bool isWhole = length > 0 && length < static_cast<ssize_t>(buffer.size());
-    return isWhole ? std::string(buffer.data(), static_cast<std::size_t>(length)) : std::string();
 }
 
 } // namespace
@@ -71,8 +50,8 @@ std::uint32_t IdentifiedItem::identifier() const
 {
     if (!_isPromise)
         return documentIdentifierOf(_file);
-    ::lseek(_file.get(), 0, SEEK_SET);
-    return identifierInPromise(readSmallFile(_file, _path, PromiseRecord::maximumFileSize));
+    const auto promise = readPromise(_file);
+    return promise ? promise->documentIdentifier : 0;
 }
 
 bool IdentifiedItem::canCarryIdentifier() const
@@ -82,31 +61,15 @@ bool IdentifiedItem::canCarryIdentifier() const
 
 SystemError IdentifiedItem::carry(std::uint32_t identifier) const
 {
-    if (_isPromise)
-        return carryInPromise(identifier);
     const auto text = std::to_string(identifier);
     const auto path = descriptorPath(_file);
-    return SystemError::unless(
-        ::setxattr(path.c_str(), itemMark::documentIdentifier, text.data(), text.size(), 0) == 0, _path);
-}
-
-SystemError IdentifiedItem::carryInPromise(std::uint32_t identifier) const
-{
-    const auto entry = DriveEntry::open(_layout, _layout.home() + '/' + _path);
-    if (!entry)
-        return {ESTALE, _path};
-    const auto found = statusAt(entry->folder, entry->promiseName());
-    if (!found)
-        return found.error;
-    if (found->st_ino != _status.st_ino || found->st_dev != _status.st_dev)
-        return {ESTALE, _path};
-    ::lseek(_file.get(), 0, SEEK_SET);
-    const auto text = readSmallFile(_file, _path, PromiseRecord::maximumFileSize);
-    auto promise = text ? PromiseRecord::parse(*text) : std::nullopt;
-    if (!promise)
-        return {EBADMSG, _path};
-    promise->documentIdentifier = identifier;
-    return host::system::writeFileAtomically(entry->folder, entry->promiseName(), promise->toJson());
+    if (::setxattr(path.c_str(), itemMark::documentIdentifier, text.data(), text.size(), 0) != 0)
+        return SystemError::last(_path);
+    // The file may have been replaced by another one, such as a new version or the downloaded document.
+    struct stat now;
+    if (::fstat(_file.get(), &now) != 0)
+        return SystemError::last(_path);
+    return now.st_nlink == 0 ? SystemError(ESTALE, _path) : SystemError();
 }
 
 Result<platform::DocumentIdentifiers::OpenFile::Attributes> IdentifiedItem::attributes() const
@@ -128,7 +91,7 @@ Result<platform::DocumentIdentifiers::OpenFile::Attributes> IdentifiedItem::attr
 std::uint32_t identifierAt(const std::string& physicalPath)
 {
     if (PromiseRecord::itemPathFor(physicalPath))
-        return identifierInPromise(readSmallFile(physicalPath, PromiseRecord::maximumFileSize));
+        return readPromise(physicalPath).value.value_or(PromiseRecord()).documentIdentifier;
     return documentIdentifierAt(physicalPath);
 }
 

@@ -25,8 +25,8 @@ public:
     /// Answers whether this is a file or a folder, or the promise of one. Nothing else can carry an
     /// identifier.
     bool canCarryIdentifier() const;
-    /// Writes another identifier to the item. A promise is replaced by a new file, and this object stays with
-    /// the old one.
+    /// Writes another identifier to the item or its promise, wherever that was moved meanwhile. ESTALE means
+    /// that the file was replaced or removed.
     system::SystemError carry(std::uint32_t identifier) const;
 
     std::uint64_t device() const { return _status.st_dev; }
@@ -43,7 +43,6 @@ private:
         , _path(std::move(path))
     {
     }
-    system::SystemError carryInPromise(std::uint32_t identifier) const;
 
     DriveLayout _layout;
     std::string _path;

@@ -49,7 +49,17 @@ Result<std::uint32_t> LocalDocumentIdentifiers::identify(const Url& url)
 
 Result<std::uint32_t> LocalDocumentIdentifiers::identifyAt(const std::string& path)
 {
+    constexpr int mostTries = 3;
     const auto lock = lockGiving(_layout);
+    auto identifier = identifyLocked(path);
+    // Another file has taken the item's place meanwhile, for example the downloaded document.
+    for (int tries = 1; tries < mostTries && !identifier && identifier.error->code() == ESTALE; ++tries)
+        identifier = identifyLocked(path);
+    return identifier;
+}
+
+Result<std::uint32_t> LocalDocumentIdentifiers::identifyLocked(const std::string& path)
+{
     const auto item = IdentifiedItem::open(_layout, path);
     if (!item && !item.error.is(ELOOP))
         return itemError(item.error, path);
@@ -100,10 +110,6 @@ Result<std::uint32_t> LocalDocumentIdentifiers::giveIdentifier(const IdentifiedI
         _index.release(*identifier);
         return itemError(failure, place.path);
     }
-    // The promise that carries the identifier is a new file.
-    const auto now = IdentifiedItem::open(_layout, place.path);
-    if (now && now->place() != place && now->identifier() == *identifier)
-        _index.note(*identifier, now->place());
     return *identifier;
 }
 

@@ -64,6 +64,7 @@ private:
     void searchFor(const IdentifiedPlace& known);
     void rebuild();
     void correct(std::uint32_t identifier, const std::string& path);
+    platform::Result<std::uint32_t> identifyLocked(const std::string& path);
     platform::Result<std::uint32_t> giveIdentifier(const IdentifiedItem& item);
     bool isOwner(const IdentifiedPlace& known, DocumentIndex::Answer::Kind kind, const DocumentPlace& place);
     bool isAt(const IdentifiedPlace& known) const;

@@ -7,7 +7,9 @@
 #include <linux/openat2.h>
 #include <sys/syscall.h>
 
+#include <array>
 #include <cerrno>
+#include <climits>
 
 namespace host::drive {
 
@@ -59,6 +61,16 @@ SystemResult<FileDescriptor> openSubfolder(const FileDescriptor& parent, const s
 std::string descriptorPath(const FileDescriptor& descriptor)
 {
     return "/proc/self/fd/" + std::to_string(descriptor.get());
+}
+
+std::string pathOf(const FileDescriptor& file)
+{
+    std::array<char, PATH_MAX> buffer;
+    const auto length = ::readlink(descriptorPath(file).c_str(), buffer.data(), buffer.size());
+    if (length == static_cast<ssize_t>(buffer.size()))
+        errno = ENAMETOOLONG;
+    const bool isWhole = length > 0 && length < static_cast<ssize_t>(buffer.size());
+    return isWhole ? std::string(buffer.data(), static_cast<std::size_t>(length)) : std::string();
 }
 
 } // namespace host::drive

@@ -23,5 +23,7 @@ host::system::SystemResult<host::system::FileDescriptor> openSubfolder(
 
 /// Answers the path under which the kernel shows an open descriptor.
 std::string descriptorPath(const host::system::FileDescriptor& descriptor);
+/// Answers the present path of an open item, or an empty text with errno when it cannot be told.
+std::string pathOf(const host::system::FileDescriptor& item);
 
 } // namespace host::drive

@@ -7,6 +7,7 @@
 
 namespace platform {
 class Dispatch;
+class FileCoordinator;
 class LinkOpener;
 class Localization;
 class NotificationCenter;
@@ -22,6 +23,7 @@ struct DriveDependencies {
     std::shared_ptr<platform::TypeRegistry> typeRegistry;
     std::shared_ptr<platform::Localization> localization; ///< null: names are not translated
     std::shared_ptr<platform::LinkOpener> linkOpener; ///< null: no page can be opened
+    std::shared_ptr<platform::FileCoordinator> fileCoordinator = {}; ///< null: no other writers are kept out
 };
 
 } // namespace host::drive

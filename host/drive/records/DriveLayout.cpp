@@ -97,7 +97,12 @@ DriveLayout DriveLayout::prepare() const
     if (error)
         return *this;
     const bool stateInside = _state == _home + "/state";
-    return at(resolved.string(), stateInside ? std::string() : _state);
+    auto layout = at(resolved.string(), stateInside ? std::string() : _state);
+    // What is needed to remove an item is made now, because a full disk must not keep an item from being
+    // removed.
+    for (const auto& folder : {layout.held(), layout.released(), layout.locks()})
+        ::mkdir(folder.c_str(), 0700);
+    return layout;
 }
 
 } // namespace host::drive

@@ -34,6 +34,8 @@ public:
     std::string keyValueStore() const { return _home + '/' + std::string(keyValueFileName); }
     std::string index() const { return _home + "/index.sqlite"; } ///< document identifiers
     std::string cloud() const { return _home + "/cloud"; } ///< contents of items that are not downloaded
+    /// The folder of contents whose promise has gone, until it is certain that no other promise names them.
+    std::string released() const { return _home + "/released"; }
     /// The folder with one file for each device, which tells its current activity.
     std::string activities() const { return _home + "/activities"; }
     /// The folder of items that are being removed, each under a private name.
@@ -42,6 +44,9 @@ public:
     std::string coordination() const { return locks() + "/coordination"; }
     /// The lock file that is held while an identifier is given to a document. Its content is never read.
     std::string identification() const { return locks() + "/identifiers"; }
+    /// The lock file that is held while the released contents are looked through. It holds how long that took
+    /// the last time, in milliseconds.
+    std::string collection() const { return locks() + "/collection"; }
     std::string locks() const { return _home + "/locks"; }
     /// The folder of the application's own state: defaults and saved interface state.
     const std::string& state() const { return _state; }
@@ -59,7 +64,8 @@ public:
     platform::Url documentsURL() const;
     platform::Url defaultContainerURL() const;
 
-    /// Creates the home folder when it is missing, for the user alone, and answers the same layout with the
+    /// Creates the home folder and the folders that removals need when they are missing, for the user alone,
+    /// and answers the same layout with the
     /// links in the home's path resolved, so that paths compare equal to the file system's answers.
     DriveLayout prepare() const;
 

@@ -3,6 +3,7 @@
 
 #include "host/drive/records/PromiseRecord.h"
 
+#include "host/drive/records/ItemMarks.h"
 #include "host/system/files/ItemPaths.h"
 
 #include <nlohmann/json.hpp>
@@ -25,6 +26,24 @@ PromiseRecord::Kind kindNamed(std::string_view name)
     return name == "directory" ? PromiseRecord::Kind::Directory
         : name == "package"    ? PromiseRecord::Kind::Package
                                : PromiseRecord::Kind::File;
+}
+
+constexpr char shortVersion = 2;
+constexpr int hasSize = 1, hasCreated = 2, hasModified = 4; // flags
+constexpr std::size_t shortFormHead = 3 + 3 * 8; // bytes before the content's name
+
+void appendNumber(std::string& form, std::uint64_t number)
+{
+    for (int byte = 0; byte < 8; ++byte)
+        form += static_cast<char>(number >> (8 * byte));
+}
+
+std::uint64_t numberAt(std::string_view form, std::size_t position)
+{
+    std::uint64_t number = 0;
+    for (std::size_t byte = 0; byte < 8; ++byte)
+        number |= std::uint64_t{static_cast<unsigned char>(form[position + byte])} << (8 * byte);
+    return number;
 }
 
 /// Takes a promise's members one by one from the library's parser. No tree of the JSON is built, because
@@ -115,18 +134,6 @@ private:
 
 } // namespace
 
-std::optional<SharedItemRole> roleNamed(std::string_view name)
-{
-    if (name == "owner")
-        return SharedItemRole::Owner;
-    return name == "participant" ? std::optional(SharedItemRole::Participant) : std::nullopt;
-}
-
-const char* nameOf(SharedItemRole role)
-{
-    return role == SharedItemRole::Owner ? "owner" : "participant";
-}
-
 std::optional<PromiseRecord> PromiseRecord::parse(std::string_view text)
 {
     PromiseReader reader;
@@ -161,6 +168,36 @@ std::string PromiseRecord::toJson() const
     if (!content.empty())
         promise["content"] = content;
     return promise.dump(-1, ' ', false, json::error_handler_t::replace) + '\n';
+}
+
+std::string PromiseRecord::shortForm() const
+{
+    std::string form{static_cast<char>(shortVersion), static_cast<char>(kind),
+        static_cast<char>((size ? hasSize : 0) | (created ? hasCreated : 0) | (modified ? hasModified : 0))};
+    appendNumber(form, size.value_or(0));
+    appendNumber(form, static_cast<std::uint64_t>(created.value_or(Date{}).nanoseconds));
+    appendNumber(form, static_cast<std::uint64_t>(modified.value_or(Date{}).nanoseconds));
+    return form + content;
+}
+
+std::optional<PromiseRecord> PromiseRecord::parseShortForm(std::string_view form)
+{
+    if (form.size() < shortFormHead || form[0] != shortVersion
+        || static_cast<unsigned char>(form[1]) > static_cast<unsigned>(Kind::Package))
+        return std::nullopt;
+    PromiseRecord promise;
+    promise.kind = static_cast<Kind>(form[1]);
+    const int flags = form[2];
+    const auto number = [&](std::size_t index) { return numberAt(form, 3 + 8 * index); };
+    if (flags & hasSize)
+        promise.size = plausibleSize(static_cast<std::int64_t>(number(0)));
+    if (flags & hasCreated)
+        promise.created = Date{static_cast<std::int64_t>(number(1))};
+    if (flags & hasModified)
+        promise.modified = Date{static_cast<std::int64_t>(number(2))};
+    promise.content = form.substr(shortFormHead);
+    const bool isName = promise.content.find('\0') == std::string::npos;
+    return isName ? std::optional(std::move(promise)) : std::nullopt;
 }
 
 std::string PromiseRecord::pathFor(std::string_view itemPath)

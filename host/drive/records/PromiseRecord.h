@@ -14,10 +14,6 @@
 
 namespace host::drive {
 
-/// The names that roles have in promises and in extended attributes: "owner" and "participant".
-std::optional<platform::SharedItemRole> roleNamed(std::string_view name);
-const char* nameOf(platform::SharedItemRole role);
-
 /// The attributes that a promise stores for its item. An attribute that is missing or cannot be right is
 /// unknown.
 struct PromiseRecord {
@@ -44,6 +40,12 @@ struct PromiseRecord {
     /// Parses a promise's text. Answers nothing when it is not a single, whole JSON object.
     static std::optional<PromiseRecord> parse(std::string_view text);
     std::string toJson() const;
+    /// Parses and writes the short form, which has at most 60 bytes when the content's name has at most 33:
+    /// the byte 2, the kind (0 file, 1 directory, 2 package), a byte of flags (1: the size is known, 2: the
+    /// day of the making, 4: the day of the last change), these three numbers in 8 bytes each, the least byte
+    /// first, and the content's name. The other members are not in it.
+    static std::optional<PromiseRecord> parseShortForm(std::string_view form);
+    std::string shortForm() const;
 
     /// Answers the path of an item's promise, which is a hidden file beside it.
     static std::string pathFor(std::string_view itemPath);

@@ -33,6 +33,8 @@ ssize_t readSome(const host::system::FileDescriptor& file, char* into, std::size
 
 Error itemError(int errorNumber, const std::string& path)
 {
+    if (errorNumber == EBADMSG)
+        return damagedRecord(path, "its file holds no promise");
     return host::system::systemError(errorNumber == ENOTDIR ? ENOENT : errorNumber, path);
 }
 
@@ -72,19 +74,17 @@ platform::Result<std::string> readSmallFile(const std::string& path, std::size_t
 platform::Result<std::string> readSmallFile(
     const host::system::FileDescriptor& file, const std::string& path, std::size_t limit)
 {
-    // Most records fit into this buffer, and a read that does not fill its buffer has reached the end, so one
-    // read is enough.
     std::array<char, 4096> buffer;
     std::string text;
     for (;;) {
         const auto count = readSome(file, buffer.data(), buffer.size());
         if (count < 0)
             return itemError(errno, path);
+        if (count == 0)
+            return text;
         text.append(buffer.data(), static_cast<std::size_t>(count));
         if (text.size() > limit)
             return damagedRecord(path, "it is larger than " + std::to_string(limit) + " bytes");
-        if (static_cast<std::size_t>(count) < buffer.size())
-            return text;
     }
 }
 

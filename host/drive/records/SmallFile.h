@@ -22,7 +22,8 @@ platform::Result<std::string> readSmallFile(
     const host::system::FileDescriptor& file, const std::string& path, std::size_t limit);
 
 /// Answers the error of a system call on an item of the drive. It is host::system::systemError(), except that
-/// an item below something that is not a folder counts as missing.
+/// an item below something that is not a folder counts as missing, and EBADMSG is
+/// CloudErrorCode::DamagedRecord.
 platform::Error itemError(int errorNumber, const std::string& path);
 inline platform::Error itemError(const host::system::SystemError& failure, const std::string& path)
 {

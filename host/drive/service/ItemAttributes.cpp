@@ -52,11 +52,7 @@ AttributeValue fileSize(const ItemFacts& facts)
 
 AttributeValue creationDate(const ItemFacts& facts)
 {
-    if (isPromised(facts))
-        return valueOf(facts.promise.created);
-    if (!(facts.status.stx_mask & STATX_BTIME))
-        return {};
-    return system::dateOf(facts.status.stx_btime);
+    return valueOf(facts.created());
 }
 
 AttributeValue downloadingStatus(const ItemFacts& facts)

@@ -3,8 +3,6 @@
 
 #include "host/drive/service/LocalCloudDocumentService.h"
 
-#include "host/drive/changes/LocalCloudStore.h"
-#include "host/drive/changes/Recovery.h"
 #include "platform/Weakly.h"
 
 namespace host::drive {
@@ -21,6 +19,7 @@ LocalCloudDocumentService::LocalCloudDocumentService(
     : _layout(layout)
     , _account(layout)
     , _store(std::make_shared<LocalCloudStore>(layout))
+    , _upkeep(std::make_shared<DriveUpkeep>(layout, _store, dependencies.dispatch))
     , _identifiers(LocalDocumentIdentifiers::create(layout, dependencies.dispatch))
     , _itemChanges(std::make_shared<IndexedItemChanges>(layout, _store, _identifiers))
     , _trash(IndexedTrash::create(layout, _itemChanges, _store, _identifiers, dependencies))
@@ -29,12 +28,16 @@ LocalCloudDocumentService::LocalCloudDocumentService(
           ItemAttributes(dependencies.typeRegistry, _containers, dependencies.localization,
               layout.defaultContainerURL()),
           std::make_shared<ThumbnailCache>(settings.thumbnailFolder, settings.thumbnailMaker), _identifiers)
-    , _items(layout, _identifiers, _store, dependencies.dispatch, dependencies.notificationCenter)
+    , _items(layout, _identifiers, _store, dependencies)
     , _storageOffers(LocalStorageOfferManager::create(layout, dependencies))
     , _keyValueStore(LocalKeyValueStore::create(layout, dependencies))
     , _monitor(AccountMonitor::start(layout, dependencies))
 {
-    Recovery(layout, *_store).run();
+    _store->onRelease(platform::weakly(_upkeep, &DriveUpkeep::contentReleased));
+    if (settings.putRight == Settings::PutRight::Beside)
+        _upkeep->putRightBeside();
+    else
+        _upkeep->putRight();
     _monitor->onFileChanged(platform::weakly(_storageOffers, &LocalStorageOfferManager::accountFileChanged));
 }
 

@@ -3,8 +3,10 @@
 
 #pragma once
 
+#include "host/drive/changes/LocalCloudStore.h"
 #include "host/drive/records/DriveDependencies.h"
 #include "host/drive/service/AccountMonitor.h"
+#include "host/drive/service/DriveUpkeep.h"
 #include "host/drive/service/IndexedItemChanges.h"
 #include "host/drive/service/IndexedTrash.h"
 #include "host/drive/service/LocalAccount.h"
@@ -26,6 +28,9 @@ public:
         std::vector<std::string> languages; ///< of the containers' names, the preferred language first
         std::string thumbnailFolder = ThumbnailCache::sharedFolder();
         std::shared_ptr<const platform::ThumbnailMaker> thumbnailMaker; ///< null: only pictures get one
+        /// Says when the drive is put right after programs that were killed: before create() answers, or in
+        /// the background, so that nothing waits for it.
+        enum class PutRight : std::uint8_t { First, Beside } putRight = PutRight::First;
     };
 
     /// Creates the drive's home folder when it is missing, and begins to watch the account.
@@ -59,7 +64,8 @@ private:
 
     DriveLayout _layout;
     LocalAccount _account;
-    std::shared_ptr<CloudStore> _store;
+    std::shared_ptr<LocalCloudStore> _store;
+    std::shared_ptr<DriveUpkeep> _upkeep;
     std::shared_ptr<LocalDocumentIdentifiers> _identifiers;
     std::shared_ptr<IndexedItemChanges> _itemChanges;
     std::shared_ptr<IndexedTrash> _trash;

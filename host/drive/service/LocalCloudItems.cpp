@@ -77,17 +77,16 @@ Result<Url> findBookmarked(
 } // namespace
 
 LocalCloudItems::LocalCloudItems(DriveLayout layout, std::shared_ptr<LocalDocumentIdentifiers> identifiers,
-    std::shared_ptr<CloudStore> store, const std::shared_ptr<platform::Dispatch>& dispatch,
-    std::shared_ptr<platform::NotificationCenter> notifications)
+    std::shared_ptr<CloudStore> store, const DriveDependencies& dependencies)
     : _layout(std::move(layout))
     , _identifiers(std::move(identifiers))
-    , _downloads(
-          std::make_shared<RunningDownloads>(LocalDownload::Setting{_layout, std::move(store),
-                                                 dispatch->makeOperationQueue("TarrowDriveAppID.downloads",
-                                                     platform::QualityOfService::UserInitiated),
-                                                 dispatch->mainQueue()},
-              std::move(notifications)))
-    , _queue(dispatch->makeSerialQueue("TarrowDriveAppID.bookmarks"))
+    , _downloads(std::make_shared<RunningDownloads>(
+          LocalDownload::Setting{_layout, std::move(store),
+              dependencies.dispatch->makeOperationQueue(
+                  "TarrowDriveAppID.downloads", platform::QualityOfService::UserInitiated),
+              dependencies.dispatch->mainQueue(), dependencies.fileCoordinator},
+          dependencies.notificationCenter))
+    , _queue(dependencies.dispatch->makeSerialQueue("TarrowDriveAppID.bookmarks"))
 {
 }
 

@@ -4,6 +4,7 @@
 #pragma once
 
 #include "host/drive/identity/LocalDocumentIdentifiers.h"
+#include "host/drive/records/DriveDependencies.h"
 #include "host/drive/records/DriveLayout.h"
 #include "host/drive/service/RunningDownloads.h"
 #include "platform/CloudItems.h"
@@ -17,8 +18,7 @@ struct Bookmark;
 class LocalCloudItems : public platform::CloudItems {
 public:
     LocalCloudItems(DriveLayout layout, std::shared_ptr<LocalDocumentIdentifiers> identifiers,
-        std::shared_ptr<CloudStore> store, const std::shared_ptr<platform::Dispatch>& dispatch,
-        std::shared_ptr<platform::NotificationCenter> notifications);
+        std::shared_ptr<CloudStore> store, const DriveDependencies& dependencies);
 
     bool isInDocumentsArea(const platform::Url& url) const override;
     bool isInTrash(const platform::Url& url) const override;

@@ -15,6 +15,16 @@ namespace {
 
 constexpr std::uint64_t bytesPerNotice = std::uint64_t{1} << 20;
 
+std::optional<platform::Error> keepOthersOut(
+    platform::FileCoordinator* coordinator, const std::string& path, const std::function<void()>& steps)
+{
+    if (coordinator)
+        return coordinator->coordinateWriting(platform::Url::fileURL(path), platform::WritingOptions::None,
+            [&](const platform::Url&) { steps(); });
+    steps();
+    return std::nullopt;
+}
+
 } // namespace
 
 /// The state is shared with the work in the background and on the main queue, which goes on when the handle
@@ -48,19 +58,23 @@ std::unique_ptr<LocalDownload> LocalDownload::start(
     auto state = std::make_shared<State>();
     state->mainQueue = setting.mainQueue;
     state->handlers = std::move(handlers);
-    setting.queue->addOperation([state, layout = setting.layout, store = setting.store, path] {
-        auto error = state->isCancelled
-            ? std::nullopt
-            : bringHere(layout, *store, path, [&](std::uint64_t done, std::optional<std::uint64_t> total) {
-                  return tell(state, done, total);
-              });
-        // The handlers are destroyed on the thread that made them.
-        state->mainQueue->async([state, error = std::move(error)] {
-            if (!state->isCancelled.exchange(true) && state->handlers.completion)
-                state->handlers.completion(error);
-            state->handlers = {};
+    setting.queue->addOperation(
+        [state, layout = setting.layout, store = setting.store, coordinator = setting.coordinator, path] {
+            auto error = state->isCancelled
+                ? std::nullopt
+                : bringHere(
+                    layout, *store, path,
+                    [&](std::uint64_t done, std::optional<std::uint64_t> total) {
+                        return tell(state, done, total);
+                    },
+                    [&](const auto& steps) { return keepOthersOut(coordinator.get(), path, steps); });
+            // The handlers are destroyed on the thread that made them.
+            state->mainQueue->async([state, error = std::move(error)] {
+                if (!state->isCancelled.exchange(true) && state->handlers.completion)
+                    state->handlers.completion(error);
+                state->handlers = {};
+            });
         });
-    });
     return std::unique_ptr<LocalDownload>(new LocalDownload(std::move(state)));
 }
 

@@ -5,6 +5,7 @@
 
 #include "host/drive/changes/CloudStore.h"
 #include "platform/Dispatch.h"
+#include "platform/FileCoordinator.h"
 #include "platform/ItemDownload.h"
 
 #include <memory>
@@ -20,6 +21,7 @@ public:
         std::shared_ptr<CloudStore> store;
         std::shared_ptr<platform::OperationQueue> queue;
         std::shared_ptr<platform::Queue> mainQueue;
+        std::shared_ptr<platform::FileCoordinator> coordinator; ///< null: no other writers are kept out
     };
 
     static std::unique_ptr<LocalDownload> start(

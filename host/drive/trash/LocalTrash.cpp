@@ -3,7 +3,7 @@
 
 #include "host/drive/trash/LocalTrash.h"
 
-#include "host/drive/changes/PromiseFile.h"
+#include "host/drive/changes/Promises.h"
 #include "host/drive/changes/TreeWalk.h"
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/ItemFacts.h"
@@ -118,7 +118,7 @@ Result<TrashedItem> LocalTrash::moveToTrash(
     if (unchangedSince && versionOf(item->found) != *unchangedSince)
         return Error(FileErrorCode::Cancelled);
     if (!item->isPromise())
-        dropRedundantPromise(item->entry, *_store);
+        static_cast<void>(settleTwin(_layout, item->entry, *_store));
     const auto trash = openTrash(_layout, LOCK_SH);
     if (!trash)
         return itemError(trash.error, path);
@@ -290,9 +290,9 @@ TrashedItem LocalTrash::describe(
     if (S_ISREG(item.found.st_mode))
         described.size = static_cast<std::uint64_t>(item.found.st_size);
     if (described.isPromise) {
-        const auto promise = readPromise(item.entry);
-        described.size = promise ? promise->size : std::nullopt;
-        if (promise && promise->kind != PromiseRecord::Kind::File)
+        const auto promise = OpenPromise::open(item.entry);
+        described.size = promise ? promise->record.size : std::nullopt;
+        if (promise && promise->record.kind != PromiseRecord::Kind::File)
             described.type = platform::FileType::Directory;
     }
     if (record) {

@@ -7,13 +7,21 @@
 
 #include <sys/stat.h>
 
+#include <limits>
+
 namespace host::system {
 
-/// Answers a time of the kernel, a timespec or a statx_timestamp, in nanoseconds since 1970.
+/// Answers a time of the kernel, a timespec or a statx_timestamp, in nanoseconds since 1970. File systems
+/// have times that 64 bits cannot hold (before 1677, after 2262); such a one is the nearest that they can.
 template <typename Time>
 std::int64_t nanosecondsOf(const Time& time)
 {
-    return std::int64_t{time.tv_sec} * 1'000'000'000 + time.tv_nsec;
+    constexpr std::int64_t perSecond = 1'000'000'000;
+    constexpr auto largest = std::numeric_limits<std::int64_t>::max();
+    if (time.tv_sec >= largest / perSecond)
+        return largest;
+    return time.tv_sec <= -largest / perSecond ? -largest
+                                               : std::int64_t{time.tv_sec} * perSecond + time.tv_nsec;
 }
 
 /// Answers a time of the kernel as a date.

@@ -3,9 +3,10 @@
 
 #include "tests/sweep/support/SweepFixture.h"
 
+#include "host/drive/changes/ContentCollection.h"
 #include "host/drive/changes/LocalCloudStore.h"
 #include "host/drive/changes/Recovery.h"
-#include "host/drive/records/PromiseRecord.h"
+#include "host/drive/records/PromiseFile.h"
 #include "host/drive/trash/LocalTrash.h"
 
 #include <sys/syscall.h>
@@ -20,6 +21,7 @@ namespace sweep_tests {
 
 namespace fs = std::filesystem;
 
+using host::drive::ContentCollection;
 using host::drive::PromiseRecord;
 using host::drive::TrashRecord;
 
@@ -110,9 +112,15 @@ void SweepFixture::atEachCall(const FaultFor& faultFor,
 
 void SweepFixture::startAgain() const
 {
+    constexpr int mostTries = 50;
     host::drive::LocalCloudStore store(_layout);
     host::drive::Recovery(_layout, store).run();
+    auto outcome = host::drive::ContentCollection(_layout).run();
+    for (int tries = 1; tries < mostTries && outcome && *outcome == ContentCollection::Outcome::Later;
+         ++tries)
+        outcome = host::drive::ContentCollection(_layout).run();
     static_cast<void>(host::drive::LocalTrash(_layout, nullptr, nullptr).items());
+    EXPECT_TRUE(outcome && *outcome == ContentCollection::Outcome::Done) << outcome.error.number();
 }
 
 bool SweepFixture::isRemoval() const
@@ -141,7 +149,7 @@ void SweepFixture::addItems(Drive& drive, const std::string& folder, const std::
         if (const auto item = PromiseRecord::itemPathFor(path)) {
             const auto promised = prefix.empty() ? *item : *PromiseRecord::itemPathFor(shown);
             drive["promise of " + promised] = behind(path);
-            for (const auto& tag : PromiseRecord::parse(read(path)).value_or(PromiseRecord()).tags)
+            for (const auto& tag : host::drive::readPromise(path).value.value_or(PromiseRecord()).tags)
                 drive["tag " + tag + " of " + promised] = tagged;
         } else if (each->path().filename().string().starts_with(".trw")) {
             each.disable_recursion_pending();
@@ -285,9 +293,13 @@ void SweepFixture::promise(const std::string& path, const std::string& content) 
 
 std::string SweepFixture::behind(const std::string& promisePath) const
 {
-    const auto record = PromiseRecord::parse(read(promisePath));
-    const auto content = _layout.cloud() + '/' + (record ? record->content : std::string("damaged"));
-    return fs::exists(content) ? read(content) : "nothing";
+    const auto record = host::drive::readPromise(promisePath);
+    const auto content = record ? record->content : std::string("damaged");
+    for (const auto& folder : {_layout.cloud(), _layout.released()}) {
+        if (fs::is_regular_file(folder + '/' + content))
+            return read(folder + '/' + content);
+    }
+    return "nothing";
 }
 
 } // namespace sweep_tests

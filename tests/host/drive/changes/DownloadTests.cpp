@@ -1,13 +1,20 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
+#include "host/drive/changes/ContentCollection.h"
 #include "host/drive/changes/DownloadWork.h"
+#include "host/drive/changes/ItemTraits.h"
 #include "host/drive/changes/LocalCloudStore.h"
 #include "host/drive/records/ItemFacts.h"
 #include "host/drive/records/SmallFile.h"
 #include "tests/support/DriveFixture.h"
 
+#include <fcntl.h>
+#include <sys/xattr.h>
+
 #include <cerrno>
+#include <cstring>
+#include <thread>
 
 namespace {
 
@@ -62,11 +69,27 @@ protected:
              },
                 [this](const std::optional<Error>& error) { ended.push_back(error); }});
     }
+    /// Looks through the released contents until that is certain.
+    ContentCollection::Outcome collect()
+    {
+        constexpr int mostTries = 100;
+        auto outcome = ContentCollection::Outcome::Later;
+        for (int tries = 0; tries < mostTries && outcome == ContentCollection::Outcome::Later; ++tries) {
+            std::this_thread::sleep_for(
+                std::chrono::milliseconds(5)); // one walk follows another after a while
+            outcome = ContentCollection(layout()).run().value.value_or(outcome);
+        }
+        return outcome;
+    }
     std::vector<DownloadProgress> heard;
     std::vector<std::optional<Error>> ended;
     std::function<void()> onProgress = [] {};
 };
 
+const KeepingOthersOut alone = [](const std::function<void()>& steps) {
+    steps();
+    return std::optional<Error>();
+};
 constexpr auto goOn = [](std::uint64_t, std::optional<std::uint64_t>) { return CloudStore::Continue::Yes; };
 
 TEST_F(DownloadTest, PutsTheDocumentWithAllThatIsKnownOfItInThePromisesPlace)
@@ -151,10 +174,12 @@ TEST_F(DownloadTest, ACancelledDownloadReportsNothingAndThePromiseStays)
     LocalCloudStore store(layout());
     std::uint64_t last = 0;
     const auto error = host::drive::bringHere(
-        layout(), store, item.path(), [&](std::uint64_t done, std::optional<std::uint64_t>) {
+        layout(), store, item.path(),
+        [&](std::uint64_t done, std::optional<std::uint64_t>) {
             last = done;
             return done > 1'000'000 ? CloudStore::Continue::No : CloudStore::Continue::Yes;
-        });
+        },
+        alone);
     ASSERT_TRUE(error);
     EXPECT_EQ(error->code(), ECANCELED);
     EXPECT_LT(last, 2'000'000U);
@@ -172,7 +197,7 @@ TEST_F(DownloadTest, WhatHappensMeanwhileCounts)
     WindowStore store(layout());
     const auto item = promise("a.txt", "cloud");
     store.beforeFetch = [&] { writeDocument("a.txt", "saved meanwhile"); };
-    auto error = host::drive::bringHere(layout(), store, item.path(), goOn);
+    auto error = host::drive::bringHere(layout(), store, item.path(), goOn, alone);
     ASSERT_TRUE(error);
     EXPECT_TRUE(error->is(FileErrorCode::ItemExists));
     EXPECT_EQ(contentOf(item.path()), "saved meanwhile");
@@ -180,18 +205,57 @@ TEST_F(DownloadTest, WhatHappensMeanwhileCounts)
 
     const auto deleted = promise("deleted", "cloud"), moved = promise("moved", "cloud");
     store.beforeFetch = [&] { fs::remove(PromiseRecord::pathFor(deleted.path())); };
-    error = host::drive::bringHere(layout(), store, deleted.path(), goOn);
+    error = host::drive::bringHere(layout(), store, deleted.path(), goOn, alone);
     ASSERT_TRUE(error);
     EXPECT_TRUE(error->is(FileErrorCode::NoSuchItem));
     EXPECT_FALSE(fs::exists(deleted.path()));
     store.beforeFetch = [&] {
         EXPECT_FALSE(cloud->fileChanges()->moveItem(moved.path(), url("there").path()));
     };
-    EXPECT_TRUE(host::drive::bringHere(layout(), store, moved.path(), goOn));
+    EXPECT_TRUE(host::drive::bringHere(layout(), store, moved.path(), goOn, alone));
     EXPECT_FALSE(fs::exists(moved.path()));
     store.beforeFetch = [] {};
-    EXPECT_FALSE(host::drive::bringHere(layout(), store, url("there").path(), goOn));
+    EXPECT_FALSE(host::drive::bringHere(layout(), store, url("there").path(), goOn, alone));
     EXPECT_EQ(contentOf(url("there").path()), "cloud");
+    EXPECT_FALSE(hasTraces());
+}
+
+/// What other processes do at the last moment, when the content has arrived.
+TEST_F(DownloadTest, NothingIsInferredFromAPromiseThatIsNoLongerThere)
+{
+    LocalCloudStore store(layout());
+    auto& changes = *cloud->fileChanges();
+    const auto item = promise("a.txt", "cloud");
+    const auto fetch = [&](const std::function<void()>& meanwhile) {
+        return host::drive::bringHere(layout(), store, item.path(), goOn, [&](const auto& steps) {
+            meanwhile();
+            return alone(steps);
+        });
+    };
+    // Another process fetches it as well, and then evicts it.
+    EXPECT_FALSE(fetch([&] { EXPECT_FALSE(bringHere(layout(), store, item.path(), goOn, alone)); }));
+    EXPECT_EQ(contentOf(item.path()), "cloud");
+    ASSERT_FALSE(changes.evictItem(item.path()));
+    int rounds = 0;
+    EXPECT_FALSE(fetch([&] {
+        if (++rounds > 1)
+            return;
+        EXPECT_FALSE(bringHere(layout(), store, item.path(), goOn, alone));
+        EXPECT_FALSE(changes.evictItem(item.path()));
+    }));
+    EXPECT_EQ(rounds, 2) << "the promise of the later eviction is fetched";
+    EXPECT_EQ(contentOf(item.path()), "cloud");
+    // It gets an identifier and tags while it is downloaded.
+    ASSERT_FALSE(changes.evictItem(item.path()));
+    std::optional<std::uint32_t> given;
+    EXPECT_FALSE(fetch([&] { given = cloud->documentIdentifiers().identify(item).value; }));
+    EXPECT_EQ(host::drive::lookAtFile(item.path()).marks.documentIdentifier, given);
+    // Its promise is moved away with its folder's name staying.
+    ASSERT_FALSE(changes.evictItem(item.path()));
+    EXPECT_TRUE(fetch([&] { EXPECT_FALSE(changes.moveItem(item.path(), url("moved").path())); }));
+    EXPECT_FALSE(fs::exists(item.path()));
+    EXPECT_FALSE(bringHere(layout(), store, url("moved").path(), goOn, alone));
+    EXPECT_EQ(contentOf(url("moved").path()), "cloud");
     EXPECT_FALSE(hasTraces());
 }
 
@@ -227,24 +291,92 @@ TEST_F(DownloadTest, FailuresToFetchAreReported)
     EXPECT_FALSE(hasTraces());
 }
 
-TEST_F(DownloadTest, TheStoreKeepsItsContentsApart)
+TEST_F(DownloadTest, AReleasedContentStaysUntilNoPromiseNamesIt)
 {
     LocalCloudStore store(layout());
-    const auto list = [&](std::int64_t since) {
-        return store.listChanges(platform::Date{since}).value.value_or(std::vector<std::string>{"failed"});
-    };
-    std::ofstream(content("a")) << "a";
-    std::ofstream(content("b")) << "b";
-    EXPECT_THAT(list(0), testing::UnorderedElementsAre("a", "b"));
-    EXPECT_THAT(list(INT64_MAX), testing::IsEmpty());
-    EXPECT_TRUE(store.move("a", "b").is(EEXIST));
-    EXPECT_TRUE(store.move("a", "../a").is(ENOENT));
-    EXPECT_FALSE(store.move("a", "c"));
-    EXPECT_EQ(contentOf(content("c")), "a");
-    EXPECT_FALSE(store.remove("../account.json"));
-    EXPECT_FALSE(store.remove("b"));
-    EXPECT_THAT(list(0), testing::ElementsAre("c"));
+    EXPECT_FALSE(store.release("../account.json"));
+    EXPECT_FALSE(store.release("nothing"));
     EXPECT_TRUE(fs::exists(layout().account()));
+    promise("a.txt", "a");
+    promise("b.txt", "b");
+    for (const auto* name : {"content-a.txt", "content-b.txt"})
+        EXPECT_FALSE(store.release(name));
+    EXPECT_EQ(store.has("content-a.txt"), true);
+    EXPECT_FALSE(host::drive::bringHere(layout(), store, url("a.txt").path(), goOn, alone));
+    ASSERT_EQ(collect(), ContentCollection::Outcome::Done);
+    EXPECT_EQ(store.has("content-a.txt"), false);
+    EXPECT_EQ(contentOf(content("content-b.txt")), "b");
+    std::ofstream(content("orphan")) << "o";
+    EXPECT_THAT(
+        ContentCollection(layout()).orphans().value, testing::Optional(testing::ElementsAre("orphan")));
+}
+
+/// A promise that another program copied, put back from a backup or unpacked.
+TEST_F(DownloadTest, ACopiedPromiseHasAFateOfItsOwn)
+{
+    const auto copy = [&](const std::string& name) {
+        promise(name, "text of " + name);
+        fs::create_directories(url("folder " + name).path());
+        const auto other = "folder " + name + "/copy";
+        fs::copy_file(PromiseRecord::pathFor(url(name).path()), PromiseRecord::pathFor(url(other).path()));
+        return url(other);
+    };
+    auto& changes = *cloud->fileChanges();
+    const std::pair<const char*, std::function<std::optional<Error>(const Url&)>> rows[] = {
+        {"deleted", [&](const Url& item) { return changes.removeItem(item.path(), std::nullopt); }},
+        {"deleted with its folder",
+            [&](const Url& item) {
+                return changes.removeItem(item.deletingLastPathComponent().path(), std::nullopt);
+            }},
+        {"fetched",
+            [&](const Url& item) {
+                LocalCloudStore store(layout());
+                return host::drive::bringHere(layout(), store, item.path(), goOn, alone);
+            }},
+    };
+    for (const auto& [name, deed] : rows) {
+        SCOPED_TRACE(name);
+        const auto copied = copy(name);
+        EXPECT_FALSE(deed(copied));
+        ASSERT_EQ(collect(), ContentCollection::Outcome::Done);
+        EXPECT_EQ(contentOf(content(std::string("content-") + name)), std::string("text of ") + name);
+        LocalCloudStore store(layout());
+        EXPECT_FALSE(host::drive::bringHere(layout(), store, url(name).path(), goOn, alone));
+        EXPECT_EQ(contentOf(url(name).path()), std::string("text of ") + name);
+        ASSERT_EQ(collect(), ContentCollection::Outcome::Done);
+        EXPECT_EQ(store.has(std::string("content-") + name), false);
+    }
+}
+
+TEST_F(DownloadTest, EvictedAndFetchedIsTheSameDocument)
+{
+    const auto item = writeDocument("a.txt", "text");
+    const auto& path = item.path();
+    ASSERT_EQ(::chmod(path.c_str(), 0751), 0);
+    for (const auto& [name, value] :
+        {std::pair("user.foreign", "kept"), {itemMark::documentIdentifier, "77"}, {itemMark::tags, "Red"}})
+        ASSERT_EQ(::setxattr(path.c_str(), name, value, std::strlen(value), 0), 0);
+    const auto before = host::drive::lookAtFile(path);
+    const auto traits = ItemTraits::read(FileDescriptor(::open(path.c_str(), O_RDONLY)));
+    ASSERT_FALSE(cloud->fileChanges()->evictItem(path));
+    struct stat promise;
+    ASSERT_EQ(::stat(PromiseRecord::pathFor(path).c_str(), &promise), 0);
+    EXPECT_EQ(promise.st_size, 0); // all of it is in the inode
+    // What is set while it is in the cloud comes back with it.
+    EXPECT_TRUE(
+        cloud->fileChanges()->editTags(path, [](const auto&) { return std::vector<std::string>{"Blue"}; }));
+    LocalCloudStore store(layout());
+    ASSERT_FALSE(host::drive::bringHere(layout(), store, path, goOn, alone));
+    const auto now = ItemTraits::read(FileDescriptor(::open(path.c_str(), O_RDONLY)));
+    auto expected = traits->attributes;
+    expected[itemMark::tags] = "Blue";
+    expected[itemMark::status] = "current";
+    expected[itemMark::created] = std::to_string(before.created()->nanoseconds);
+    EXPECT_EQ(now->attributes, expected);
+    EXPECT_EQ(now->mode, 0751U);
+    const auto after = host::drive::lookAtFile(path);
+    EXPECT_EQ(after.created(), before.created());
+    EXPECT_EQ(after.modified(), before.modified());
 }
 
 } // namespace

@@ -188,10 +188,9 @@ TEST_F(ItemChangesTest, APromiseBesideADocumentGoesOnlyWhenItAddsNothing)
     fs::create_directories(layout().cloud());
     const auto makeTwins = [&](const std::string& name, const char* behind) {
         host::drive::PromiseRecord promise;
-        promise.content = "content";
-        fs::remove(layout().cloud() + "/content");
+        promise.content = behind ? std::string("content of ") + behind : "content";
         if (behind)
-            std::ofstream(layout().cloud() + "/content") << behind;
+            std::ofstream(layout().cloud() + '/' + promise.content) << behind;
         writePromise(name, promise);
         return writeDocument(name, "document");
     };
@@ -214,7 +213,7 @@ TEST_F(ItemChangesTest, APromiseBesideADocumentGoesOnlyWhenItAddsNothing)
     writeDocument("a.txt", "document");
     EXPECT_FALSE(changes().removeItem(item.path(), std::nullopt));
     EXPECT_TRUE(hasPromise(item));
-    EXPECT_EQ(contentOf(layout().cloud() + "/content"), "unseen");
+    EXPECT_EQ(contentOf(layout().cloud() + "/content of unseen"), "unseen");
     EXPECT_FALSE(changes().removeItem(item.path(), std::nullopt)) << "the promise shows, and can be removed";
     EXPECT_TRUE(fs::is_empty(layout().cloud()));
 }
@@ -240,6 +239,88 @@ TEST_F(ItemChangesTest, WhatCannotBePutBackGoesToTheTrash)
     EXPECT_EQ(contentOf(layout().trash() + "/a.txt"), "old");
     EXPECT_EQ(contentOf(layout().trash() + "/b.txt"), "older");
     EXPECT_EQ(contentOf(layout().trash() + "/b.txt 2"), "old");
+}
+
+TEST_F(ItemChangesTest, NothingGetsANameThatTheDriveNeedsForItself)
+{
+    const auto item = writeDocument("a.txt");
+    makeFolder("folder");
+    for (const auto* name : {".b.txt.trwpromise", ".trwtmp-1", ".trwheld-1", "folder/.trwgone-1"}) {
+        SCOPED_TRACE(name);
+        const auto taken = url(name).path();
+        const std::optional<Error> answers[] = {changes().createFolder(taken),
+            changes().createFolder(taken + "/below"), changes().moveItem(item.path(), taken),
+            changes().addDocument(taken, item.path(), "text")};
+        for (const auto& answer : answers)
+            EXPECT_TRUE(answer && answer->is(FileErrorCode::InvalidName));
+        EXPECT_FALSE(fs::exists(taken));
+    }
+    EXPECT_FALSE(hasTraces());
+}
+
+/// The local store, in which something can happen just before a document is moved into it.
+class EvictionStore : public LocalCloudStore {
+public:
+    using LocalCloudStore::LocalCloudStore;
+    host::system::SystemError store(
+        const DriveEntry& document, const ItemVersion& version, const std::string& content) override
+    {
+        beforeStore();
+        return LocalCloudStore::store(document, version, content);
+    }
+    std::function<void()> beforeStore;
+};
+
+TEST_F(ItemChangesTest, AnEvictionThatFindsNoDocumentLeavesNoPromise)
+{
+    const auto store = std::make_shared<EvictionStore>(layout());
+    LocalItemChanges evicting(layout(), store);
+    const auto item = writeDocument("a.txt", "text"), away = url("away.txt");
+    const auto evict = [&](const std::function<void()>& meanwhile) {
+        store->beforeStore = meanwhile;
+        EXPECT_TRUE(evicting.evictItem(item.path()));
+        EXPECT_FALSE(fs::exists(PromiseRecord::pathFor(item.path())));
+        EXPECT_FALSE(hasTraces());
+    };
+    evict([&] { fs::rename(item.path(), away.path()); });
+    EXPECT_EQ(contentOf(away.path()), "text");
+    fs::rename(away.path(), item.path());
+    evict([&] { writeDocument("a.txt", "saved meanwhile"); });
+    EXPECT_EQ(contentOf(item.path()), "saved meanwhile");
+    evict([&] { fs::remove(item.path()); });
+}
+
+TEST_F(ItemChangesTest, WhatBelongsToAPlaceThatCannotBeOpenedWaitsForIt)
+{
+    const auto folder = makeFolder("folder");
+    const auto item = writeDocument("folder/a.txt", "text");
+    const auto child = ::fork();
+    if (child == 0) {
+        const auto held = take(item);
+        ::_exit(0); // as when it is killed
+    }
+    ::waitpid(child, nullptr, 0);
+    fs::rename(folder.path(), url("elsewhere").path());
+    fs::create_directory_symlink("elsewhere", folder.path());
+    recover();
+    EXPECT_TRUE(fs::is_empty(layout().trash())) << "a link in its way does not mean that the folder is gone";
+    fs::remove(folder.path());
+    fs::rename(url("elsewhere").path(), folder.path());
+    recover();
+    EXPECT_EQ(contentOf(item.path()), "text");
+}
+
+TEST_F(ItemChangesTest, StraysWithoutARecordAreFoundAmongTheItems)
+{
+    const auto stray = [&](const std::string& name) { return writeDocument("folder/" + name, name).path(); };
+    const auto copy = stray(".trwtmp-1"), held = stray(".trwheld-1"), gone = stray(".trwgone-1");
+    LocalCloudStore store(layout());
+    EXPECT_FALSE(Recovery(layout(), store).settleStraysAmongItems());
+    EXPECT_TRUE(fs::exists(copy) && fs::exists(held) && fs::exists(gone))
+        << "a program may still work on them";
+    EXPECT_FALSE(Recovery(layout(), store, std::chrono::nanoseconds(0)).settleStraysAmongItems());
+    EXPECT_FALSE(fs::exists(copy) || fs::exists(held) || fs::exists(gone));
+    EXPECT_EQ(contentOf(layout().trash() + "/Recovered item"), ".trwheld-1");
 }
 
 TEST_F(ItemChangesTest, AMountIsNotEnteredAndDoesNotHideAMoveOfAFolderIntoItself)

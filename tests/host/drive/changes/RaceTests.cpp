@@ -156,6 +156,8 @@ TEST_F(RaceTest, NoVersionIsReplacedThatWasNotRead)
         }
     }
     saver.stop();
+    EXPECT_THAT(contentOf(item.path()), testing::AnyOf(std::to_string(saver.saved), "0"))
+        << "the newest version has the name";
     expectNoneLost(saver, accounted);
     EXPECT_GT(replaced, 0);
     EXPECT_GT(saver.saved, 1);

@@ -5,6 +5,7 @@
 #include "host/drive/changes/LocalCloudStore.h"
 #include "host/drive/changes/LocalItemChanges.h"
 #include "host/drive/records/ItemFacts.h"
+#include "host/drive/records/PromiseFile.h"
 #include "host/drive/records/SmallFile.h"
 #include "tests/support/DriveFixture.h"
 
@@ -37,7 +38,7 @@ protected:
     Tags tagsOf(const Url& item) const { return cloud->promisedItems().readItem(item, {}).tagNames; }
     PromiseRecord promiseOf(const Url& item) const
     {
-        return PromiseRecord::parse(contentOf(PromiseRecord::pathFor(item.path()))).value_or(PromiseRecord());
+        return readPromise(PromiseRecord::pathFor(item.path())).value.value_or(PromiseRecord());
     }
     /// Puts another document in the place of one, as a program that saves does.
     void replace(const std::string& path, std::string_view content) const
@@ -189,8 +190,13 @@ TEST_F(TagTest, ThatAreGivenDuringADownloadStay)
     WindowStore store(layout());
     for (const Tags& tags : {Tags{"Red", "Blue"}, Tags{}}) {
         store.beforeFetch = [&] { EXPECT_TRUE(set(item, tags)); };
-        EXPECT_FALSE(bringHere(layout(), store, item.path(),
-            [](std::uint64_t, std::optional<std::uint64_t>) { return CloudStore::Continue::Yes; }));
+        EXPECT_FALSE(bringHere(
+            layout(), store, item.path(),
+            [](std::uint64_t, std::optional<std::uint64_t>) { return CloudStore::Continue::Yes; },
+            [](const auto& steps) {
+                steps();
+                return std::optional<platform::Error>();
+            }));
         EXPECT_EQ(contentOf(item), "text");
         EXPECT_EQ(tagsOf(item), tags);
         fs::remove(item.path());
