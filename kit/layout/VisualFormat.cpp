@@ -203,7 +203,12 @@ private:
     {
         double number = 0;
         const char* begin = _format.data() + _position;
-        const auto read = std::from_chars(begin, _format.data() + _format.size(), number);
+        // The library would also find "inf" and "nan" at the beginning of a name.
+        const auto digits = _format.substr(_position + (peek() == '-' ? 1 : 0));
+        const bool hasDigits =
+            !digits.empty() && (std::isdigit(static_cast<unsigned char>(digits[0])) || digits[0] == '.');
+        const auto read = hasDigits ? std::from_chars(begin, _format.data() + _format.size(), number)
+                                    : std::from_chars_result{begin, std::errc::invalid_argument};
         if (read.ec == std::errc()) {
             _position += static_cast<std::size_t>(read.ptr - begin);
             return number;

@@ -327,7 +327,7 @@ TEST(VisualFormat, NamesThePlaceOfAMistakeAndMakesNothing)
     const auto a = constrained(*root);
     const std::pair<const char*, std::size_t> rows[] = {{"", 0}, {"|", 1}, {"H:[b]", 3}, {"H:|-[a", 6},
         {"[a]-", 4}, {"[a]-x-[a]", 4}, {"[a(>=)]", 5}, {"[a(>=5@1001)]", 7}, {"[a(50]", 5}, {"|[a]|[a]", 5},
-        {"|[loose]", 8}, {"H:|-16-[a]=|", 10}, {"[a]-(==a)-[a]", 13}};
+        {"|[loose]", 8}, {"H:|-16-[a]=|", 10}, {"[a]-(==a)-[a]", 13}, {"[a(inf)]", 3}, {"[a]-nan-[a]", 4}};
     for (const auto& [format, position] : rows) {
         const auto result =
             VisualFormat::parse(format, {{{"a", a}, {"loose", std::make_shared<View>()}}, {}});
@@ -344,8 +344,8 @@ TEST(VisualFormat, ReadsEveryForm)
     a->setDebugName("a");
     b->setDebugName("b");
     root->setDebugName("root");
-    const auto result = VisualFormat::parse("H:|-[a(>=50@750,<=b)]-(>=gap,<=20@700)-[b(30)]-4.5-|",
-        {{{"a", a}, {"b", b}}, {{"gap", 3}}, LayoutAttribute::CenterY});
+    const auto result = VisualFormat::parse("H:|-[a(>=50@750,<=b)]-(>=gap,<=infoGap@700)-[b(30)]-4.5-|",
+        {{{"a", a}, {"b", b}}, {{"gap", 3}, {"infoGap", 20}}, LayoutAttribute::CenterY});
     ASSERT_FALSE(result.error) << result.error->message;
     std::vector<std::string> texts;
     for (const auto& constraint : result.constraints)
