@@ -14,6 +14,7 @@
 
 option(TRW_BUILD_TESTS "Build the tests" ON)
 option(TRW_BUILD_BENCH "Build the benchmarks" OFF)
+option(TRW_BUILD_FUZZERS "Build the fuzzers; linking them needs clang" OFF)
 option(TRW_CHECK_HEADERS "Make the target trw_headers, which compiles headers alone" OFF)
 option(TRW_PRIVATE_LOG "Show private log arguments without being asked (development builds)" OFF)
 set(TRW_SANITIZE "" CACHE STRING "Sanitizers to build with, for -fsanitize=")
