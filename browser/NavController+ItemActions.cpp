@@ -445,19 +445,25 @@ void NavController::showDICUrlCompletion(
     static constexpr Operation op{"-[NavController showDIC:url:completion:]"};
     op.userAction("Show Share Sheet (nav)");
     op.info("showDIC: %@", url);
-    const auto resolved = trw_URLByResolvingBookmark(url).value_or(url);
-    if (resolved != url)
-        op.info("URL resolved to %@", resolved);
     _performActionCompletionBlock = completion;
+    lookThen([url] { return LaunchUtils::sharedItemAt(url); },
+        [url, originatingView](NavController& self, const LaunchUtils::SharedItem& shared) {
+            if (shared.url != url)
+                op.info("URL resolved to %@", shared.url);
+            self.showSharingMenu(originatingView, shared);
+        },
+        {});
+}
+
+void NavController::showSharingMenu(
+    const std::shared_ptr<kit::View>& originatingView, const LaunchUtils::SharedItem& shared)
+{
     const auto anchor = originatingView ? originatingView : view();
     const auto bounds = anchor->bounds();
     const auto rect =
         originatingView ? platform::Rect{bounds.x, bounds.midY(), bounds.width, 0} : platform::Rect{};
-    const auto sheet = screens::DocumentInteractionSheet::interactionControllerWithURL(resolved);
-    const auto& containers = services().cloudDocumentService().containers();
-    const auto container = containers.containerForItem(resolved);
-    if (containers.isContainerTopFolder(resolved) && container && *container)
-        sheet->setName((*container)->localizedName);
+    const auto sheet =
+        screens::DocumentInteractionSheet::interactionControllerWithURLFacts(shared.url, shared.facts);
     sheet->setDelegate(self());
     _documentInteractionController = sheet;
     sheet->presentOptionsMenuFromRectInView(visibleViewController(), rect, anchor, true);

@@ -21,6 +21,7 @@
 #include "prompts/UIUtils.h"
 #include "screens/DisplayName.h"
 #include "screens/EndPresented.h"
+#include "screens/FolderPlaces.h"
 #include "screens/list/DocumentListController.h"
 
 #include <array>
@@ -58,6 +59,14 @@ struct NavController::PickedItem {
     std::shared_ptr<DRItem> target; ///< the item itself, or where a link leads; null: nowhere in the drive
     std::string refusal; ///< says why a link cannot be followed
     LaunchUtils::DocumentFacts launch;
+    std::vector<screens::TitledFolder> folders; ///< that lead to it, where they are needed
+};
+
+/// The facts about an item that a peek shows.
+struct NavController::PeekedItem {
+    Url url;
+    std::shared_ptr<DRItem> document; ///< null: no document, or gone
+    std::optional<std::string> folderTitle; ///< absent: no folder
 };
 
 namespace {
@@ -257,11 +266,23 @@ void NavController::documentListControllerDidSelectContainerWithViewController(
     if (isSearchPresented()) {
         dismissViewController(true);
         // A search result is shown in its real place in the drive.
-        if (warpToFolderForURL(*container->presentedURL()))
-            return;
+        lookThen([url = *container->presentedURL()] { return PreviewItemManager::foldersForURL(url); },
+            [container](NavController& self, const std::vector<screens::TitledFolder>& folders) {
+                if (folders.empty())
+                    self.pushList(container);
+                else
+                    self.setViewControllers(asScreens(DocumentListController::listsOf(folders)), false);
+            },
+            {});
+        return;
     }
-    initNewListController(container);
-    pushViewController(container, true);
+    pushList(container);
+}
+
+void NavController::pushList(const List& list)
+{
+    initNewListController(list);
+    pushViewController(list, true);
 }
 
 void NavController::documentListControllerDidSelectItemAtURL(const List&, const Url& url)
@@ -277,7 +298,7 @@ void NavController::documentListControllerDidSelectItemAtURL(const List&, const 
 NavController::PickedItem NavController::lookAtPicked(const Url& url, bool followsLinks)
 {
     static constexpr Operation op{"-[NavController documentListController:didSelectItemAtURL:]"};
-    PickedItem picked{DRItem::initWithURL(url), {}, {}, {}};
+    PickedItem picked{DRItem::initWithURL(url), {}, {}, {}, {}};
     picked.target = picked.item;
     if (picked.item && picked.item->isSymlink() && followsLinks) {
         auto target = followLink(*picked.item, op);
@@ -287,6 +308,8 @@ NavController::PickedItem NavController::lookAtPicked(const Url& url, bool follo
     }
     if (picked.target)
         picked.launch = LaunchUtils::factsOf(picked.target->url());
+    if (picked.target && picked.target->isDirectory())
+        picked.folders = PreviewItemManager::foldersForURL(picked.target->url());
     return picked;
 }
 
@@ -307,7 +330,7 @@ void NavController::openPicked(const Url& url, const PickedItem& picked)
         return tell(picked.refusal);
     if (picked.target->isDirectory()) {
         op.debug("Building DLC stack for symlink to %@", picked.target->url());
-        openFolder(picked.target->url(), op);
+        openFolder(picked, op);
     } else {
         openDocument(picked.target, picked.launch, op);
     }
@@ -321,12 +344,12 @@ void NavController::showVanishedItem(const Url& url)
     services().dispatch().mainQueue()->async(weakly(this, &NavController::setupInitialViewController));
 }
 
-void NavController::openFolder(const Url& url, const Operation& op)
+void NavController::openFolder(const PickedItem& picked, const Operation& op)
 {
-    if (const auto stack = PreviewItemManager::dlcStackForURL(url))
-        setViewControllers(asScreens(*stack), true);
+    if (picked.folders.empty())
+        op.error("Couldn't build DLC stack for %@. Not switching to folder", picked.target->url());
     else
-        op.error("Couldn't build DLC stack for %@. Not switching to folder", url);
+        setViewControllers(asScreens(DocumentListController::listsOf(picked.folders)), true);
 }
 
 void NavController::openDocument(
@@ -371,6 +394,31 @@ void NavController::documentListControllerURLWasRemoved(const List& list)
     popViewController(true);
 }
 
+NavController::PeekedItem NavController::lookAtPeeked(const Url& url)
+{
+    constexpr std::array keys{
+        AttributeKey::IsPackage, AttributeKey::IsRegularFile, AttributeKey::IsDirectory};
+    PeekedItem peeked{url, {}, {}};
+    const auto values =
+        services().cloudDocumentService().promisedItems().promisedItemResourceValues(url, keys).value;
+    if (values && (values->flag(AttributeKey::IsPackage) || values->flag(AttributeKey::IsRegularFile)))
+        peeked.document = DRItem::initWithURL(url);
+    else if (values && values->flag(AttributeKey::IsDirectory))
+        peeked.folderTitle = screens::folderTitle(url);
+    return peeked;
+}
+
+void NavController::documentListControllerPrepareToPreviewItemAtURL(
+    const List&, const Url& url, const Completion& ready)
+{
+    lookThen([url] { return lookAtPeeked(url); },
+        [ready](NavController& self, const PeekedItem& peeked) {
+            self._peekedItem = std::make_shared<PeekedItem>(peeked);
+            ready();
+        },
+        {});
+}
+
 NavController::Screen NavController::documentListControllerViewControllerForPreviewingItemAtURL(
     const List&, const Url& url)
 {
@@ -378,56 +426,86 @@ NavController::Screen NavController::documentListControllerViewControllerForPrev
         "-[NavController documentListController:viewControllerForPreviewingItemAtURL:]"};
     op.userAction("DLC Action Firmtap Peek");
     op.debug("DLC asking for PeekVC for %@", url);
-    constexpr std::array keys{
-        AttributeKey::IsPackage, AttributeKey::IsRegularFile, AttributeKey::IsDirectory};
-    const auto values =
-        services().cloudDocumentService().promisedItems().promisedItemResourceValues(url, keys).value;
-    if (values && (values->flag(AttributeKey::IsPackage) || values->flag(AttributeKey::IsRegularFile))) {
+    const auto known = std::exchange(_peekedItem, nullptr);
+    const auto peeked = known && known->url == url ? *known : lookAtPeeked(url);
+    if (peeked.document) {
         completeTransition();
         _itemManager = PreviewItemManager::newItemManagerWithModeNavController(PreviewModeQuick, self());
         _itemManager->setUndoHistory(_undoHistory);
         _peekManager = _itemManager;
-        return _itemManager->prepareToPreviewItem(DRItem::initWithURL(url));
+        return _itemManager->prepareToPreviewItem(peeked.document);
     }
-    if (values && values->flag(AttributeKey::IsDirectory))
-        return PeekFolderViewController::initWithURL(url);
+    if (peeked.folderTitle)
+        return PeekFolderViewController::initWithURLTitle(url, *peeked.folderTitle);
     op.debug("URL is not a regular file, package, or folder");
     return nullptr;
 }
 
 void NavController::documentListControllerPeekDidEnd(const List&)
 {
+    dropPeek();
+}
+
+void NavController::dropPeek()
+{
     // A pop has put the preview on the stack, and any other preview has a manager of its own.
     const bool isStillPeeks = _itemManager && _itemManager == _peekManager.lock();
-    if (isStillPeeks && getTopDocumentListController())
+    if (isStillPeeks && !_isPopping && getTopDocumentListController())
         dropItemManager();
 }
 
 void NavController::knopPopToURL(const Url& url)
 {
-    static constexpr Operation op{"-[NavController knopPopToURL:]"};
-    const bool searching = isSearchPresented();
-    if (searching)
+    const bool isFromSearch = isSearchPresented();
+    if (isFromSearch)
         dismissViewController(true);
-    const auto item = DRItem::initWithURL(url);
-    if (!item)
+    const auto look = [url] {
+        auto popped = lookAtPicked(url, false);
+        popped.folders = PreviewItemManager::foldersForURL(url);
+        return popped;
+    };
+    _look->forget();
+    _isPopping = true;
+    const auto end = [](NavController& self) {
+        self._isPopping = false;
+        self.dropPeek();
+    };
+    lookThen(
+        look,
+        [url, isFromSearch, end](NavController& self, const PickedItem& popped) {
+            self.openPopped(url, popped, isFromSearch);
+            end(self);
+        },
+        weakly(this, end));
+}
+
+void NavController::openPopped(const Url& url, const PickedItem& popped, bool isFromSearch)
+{
+    static constexpr Operation op{"-[NavController knopPopToURL:]"};
+    if (!popped.item)
         return;
-    if (item->isDirectory()) {
-        op.debug("Building DLC stack for Firmtap of %@", item->url());
-        openFolder(item->url(), op);
+    if (popped.item->isDirectory()) {
+        op.debug("Building DLC stack for Firmtap of %@", url);
+        openFolder(popped, op);
         return;
     }
-    _recentDocument.opened(*item);
-    if (LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(item->url(), topViewController(), true)) {
+    _recentDocument.opened(*popped.item);
+    if (LaunchUtils::openInDefaultAppFactsViewControllerRequireOpenIn(
+            url, popped.launch, topViewController(), true)) {
         op.debug("openInDefaultApp returned YES, app launched");
         return;
     }
     op.debug("openInDefaultApp returned NO, showing cached Lookwell from Knop");
+    pushPeekedPreview(popped, isFromSearch);
+}
+
+void NavController::pushPeekedPreview(const PickedItem& popped, bool isFromSearch)
+{
     const auto preview = _itemManager ? _itemManager->currentLookwellController() : nullptr;
-    if (searching) {
+    if (isFromSearch && !popped.folders.empty()) {
         // The folder's list would drop the manager, which only the browser owns.
         const auto manager = std::exchange(_itemManager, nullptr);
-        warpToFolderForURL(url);
+        setViewControllers(asScreens(DocumentListController::listsOf(popped.folders)), false);
         completeTransition();
         _itemManager = manager;
     }

@@ -3,7 +3,6 @@
 
 #pragma once
 
-#include "browser/LatestLook.h"
 #include "browser/RecentDocument.h"
 #include "items/AccountSession.h"
 #include "items/LaunchUtils.h"
@@ -174,6 +173,8 @@ public:
     void documentListControllerItemsChanged(const List& list) override;
     void documentListControllerURLWasRemoved(const List& list) override;
     void documentListControllerRequestsEditing(const List& list) override;
+    void documentListControllerPrepareToPreviewItemAtURL(
+        const List& list, const platform::Url& url, const Completion& ready) override;
     Screen documentListControllerViewControllerForPreviewingItemAtURL(
         const List& list, const platform::Url& url) override;
     void documentListControllerPeekDidEnd(const List& list) override;
@@ -238,14 +239,25 @@ private:
     bool isSearchPresented() const;
     void endChoiceOfItems();
     void showVanishedItem(const platform::Url& url);
-    void openFolder(const platform::Url& url, const platform::Operation& op);
+    void pushList(const List& list);
     struct PickedItem;
+    void openFolder(const PickedItem& picked, const platform::Operation& op);
     static PickedItem lookAtPicked(const platform::Url& url, bool followsLinks);
+    /// Opens what a peek showed, and puts the peek's preview on the stack. In a search a document's folder is
+    /// shown below it.
+    void openPopped(const platform::Url& url, const PickedItem& popped, bool isFromSearch);
+    void pushPeekedPreview(const PickedItem& popped, bool isFromSearch);
+    /// Drops the manager of a peek that has ended, unless its preview is on the stack or about to be.
+    void dropPeek();
+    struct PeekedItem;
+    static PeekedItem lookAtPeeked(const platform::Url& url);
     void openPicked(const platform::Url& url, const PickedItem& picked);
     void openDocument(const std::shared_ptr<DRItem>& item, const LaunchUtils::DocumentFacts& facts,
         const platform::Operation& op);
     void performDelete(
         const platform::Url& url, const std::shared_ptr<kit::View>& view, const Completion& completion);
+    void showSharingMenu(
+        const std::shared_ptr<kit::View>& originatingView, const LaunchUtils::SharedItem& shared);
     void performInfo(const platform::Url& url, const Completion& completion);
     void editTagsOfItems(const std::vector<platform::Url>& items);
     /// Looks at the disk on another thread and goes on with what was found, unless a person has asked for
@@ -298,6 +310,8 @@ private:
     std::shared_ptr<QuotaFetcher> _quotaFetcher;
     std::shared_ptr<PreviewItemManager> _itemManager;
     std::weak_ptr<PreviewItemManager> _peekManager; ///< the manager of the latest peek
+    bool _isPopping = false; ///< the item of the latest peek is being looked at, to be opened
+    std::shared_ptr<PeekedItem> _peekedItem; ///< looked up for a peek that is about to be shown; null: none
     std::shared_ptr<FilenamePrompt> _folderPromptAlert;
     Completion _performActionCompletionBlock;
     std::shared_ptr<screens::UpgradeFlow> _upgradeFlowMgr;
@@ -305,7 +319,7 @@ private:
     std::uint64_t _quotaBytes = 0;
     RecentDocument _recentDocument;
     std::optional<AccountSession> _moveAsked; ///< who was asked last for the destination of a move
-    const std::shared_ptr<LatestLook> _look = std::make_shared<LatestLook>();
+    const std::shared_ptr<platform::LatestLook> _look = std::make_shared<platform::LatestLook>();
     std::shared_ptr<RunningChanges> _runningChanges; ///< null before the first change
     std::shared_ptr<UndoHistory> _undoHistory;
     std::vector<platform::Observation> _observations;

@@ -10,4 +10,10 @@ std::shared_ptr<PeekFolderViewController> PeekFolderViewController::initWithURL(
     return std::make_shared<PeekFolderViewController>(url);
 }
 
+std::shared_ptr<PeekFolderViewController> PeekFolderViewController::initWithURLTitle(
+    const platform::Url& url, const std::string& title)
+{
+    return std::make_shared<PeekFolderViewController>(url, title);
+}
+
 } // namespace tarrow

@@ -11,6 +11,9 @@ namespace tarrow {
 class PeekFolderViewController : public screens::DocumentListController {
 public:
     static std::shared_ptr<PeekFolderViewController> initWithURL(const platform::Url& url);
+    /// Looks at nothing, for a folder whose name is known.
+    static std::shared_ptr<PeekFolderViewController> initWithURLTitle(
+        const platform::Url& url, const std::string& title);
 
     using DocumentListController::DocumentListController;
 

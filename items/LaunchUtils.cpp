@@ -5,7 +5,6 @@
 
 #include "items/FileUtils.h"
 #include "items/UrlResolution.h"
-#include "screens/DocumentInteractionSheet.h"
 #include "screens/list/DocumentListController.h"
 
 #include <algorithm>
@@ -139,12 +138,20 @@ std::vector<AppHandle> LaunchUtils::availableAppsForDoc(const platform::Document
 LaunchUtils::DocumentFacts LaunchUtils::factsOf(const Url& url)
 {
     DocumentFacts facts{
-        FileUtils::exists(url), trw_URLByResolvingBookmark(url), isUrlInDefaultContainer(url), {}};
+        FileUtils::exists(url), trw_URLByResolvingBookmark(url), isUrlInDefaultContainer(url), {}, {}};
+    if (facts.resolved)
+        facts.target = DocumentInteractionSheet::lookUp(*facts.resolved);
     const auto identifier =
         facts.isInDefaultContainer ? std::nullopt : containers().containerIdentifierInURL(url);
     if (identifier)
         facts.library = containers().containerWithIdentifier(*identifier);
     return facts;
+}
+
+LaunchUtils::SharedItem LaunchUtils::sharedItemAt(const Url& url)
+{
+    const auto resolved = trw_URLByResolvingBookmark(url).value_or(url);
+    return {resolved, DocumentInteractionSheet::lookUp(resolved)};
 }
 
 std::optional<AppHandle> LaunchUtils::defaultAppForDocumentRequireOpenIn(const Url& url, bool requireOpenIn)
@@ -155,7 +162,13 @@ std::optional<AppHandle> LaunchUtils::defaultAppForDocumentRequireOpenIn(const U
 std::optional<std::string> LaunchUtils::defaultAppNameForDocumentRequireOpenIn(
     const Url& url, bool requireOpenIn)
 {
-    const auto app = defaultAppForDocumentRequireOpenIn(url, requireOpenIn);
+    return defaultAppNameForDocumentFactsRequireOpenIn(factsOf(url), requireOpenIn);
+}
+
+std::optional<std::string> LaunchUtils::defaultAppNameForDocumentFactsRequireOpenIn(
+    const DocumentFacts& facts, bool requireOpenIn)
+{
+    const auto app = defaultApp(facts, requireOpenIn);
     return app ? std::optional(app->localizedName) : std::nullopt;
 }
 
@@ -177,7 +190,8 @@ bool LaunchUtils::openInDefaultAppFactsViewControllerRequireOpenIn(const Url& ur
     const auto opened = std::make_shared<bool>(false);
     const auto& resolved = *facts.resolved;
     DocumentListController::openOutOfDriveViewControllerAction(resolved, viewController, [=] {
-        const auto sheet = DocumentInteractionSheet::interactionControllerWithURL(resolved);
+        const auto sheet =
+            DocumentInteractionSheet::interactionControllerWithURLFacts(resolved, facts.target);
         *opened = sheet->openDocumentInPlaceInApp(*app);
     });
     return *opened;

@@ -5,6 +5,7 @@
 
 #include "items/PlatformNames.h"
 #include "platform/AppRegistry.h"
+#include "screens/DocumentInteractionSheet.h"
 
 #include <memory>
 #include <optional>
@@ -31,9 +32,18 @@ public:
         std::optional<Url> resolved; ///< absent for a reference that cannot be read
         bool isInDefaultContainer = false;
         std::shared_ptr<const DocumentContainer> library; ///< null in the default container
+        screens::DocumentInteractionSheet::ItemFacts target; ///< of what `resolved` leads to
     };
     /// Looks them up. Any thread.
     static DocumentFacts factsOf(const Url& url);
+
+    /// An item whose menu of actions is shown: where it really lies, and what the disk says about it there.
+    struct SharedItem {
+        Url url;
+        screens::DocumentInteractionSheet::ItemFacts facts;
+    };
+    /// Looks it up. Any thread.
+    static SharedItem sharedItemAt(const Url& url);
 
     /// Opens a document in its default app and answers whether it did. The platform may first ask on the
     /// screen.
@@ -50,6 +60,9 @@ public:
     /// Answers the localized name of that app.
     static std::optional<std::string> defaultAppNameForDocumentRequireOpenIn(
         const Url& url, bool requireOpenIn);
+    /// Answers it with facts that are known already, and looks at nothing.
+    static std::optional<std::string> defaultAppNameForDocumentFactsRequireOpenIn(
+        const DocumentFacts& facts, bool requireOpenIn);
 
     /// Answers the apps that own the document's type and can open the document in its place, in the
     /// registry's order.

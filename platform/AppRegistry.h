@@ -67,9 +67,9 @@ public:
     virtual std::string ownBundleIdentifier() const = 0;
 
     /// Has an app open a document where the document lies, and answers whether the app was started; what the
-    /// app then does is not waited for. It answers false when nothing lies at the location (a promise has no
-    /// content yet), when the app is not installed any more, and when it cannot be started, which is logged
-    /// with the reason.
+    /// app then does is not waited for. Whether something lies at the location is the caller's to look up,
+    /// because the disk may be slow. It answers false when the app is not installed any more, and when it
+    /// cannot be started, which is logged with the reason.
     virtual bool openInPlace(const Url& document, const AppHandle& app) = 0;
 };
 

@@ -64,11 +64,17 @@ void LookwellItemController::viewWillDisappear(bool animated)
 void LookwellItemController::showOtherApps(const Url& item, const std::shared_ptr<kit::View>& from)
 {
     using screens::DocumentInteractionSheet;
-    const auto sheet = DocumentInteractionSheet::interactionControllerWithURL(item);
-    if (const auto manager = itemManager())
+    const auto show = [item, from](
+                          LookwellItemController& self, const DocumentInteractionSheet::ItemFacts& facts) {
+        const auto manager = self.itemManager();
+        if (!self.isVisible() || !manager)
+            return;
+        const auto sheet = DocumentInteractionSheet::interactionControllerWithURLFacts(item, facts);
         manager->setDocumentInteractionController(sheet);
-    sheet->presentOptionsMenuFromRectInView(
-        shared_from_this(), from ? from->bounds() : platform::Rect(), from, true);
+        sheet->presentOptionsMenuFromRectInView(
+            self.shared_from_this(), from ? from->bounds() : platform::Rect(), from, true);
+    };
+    _look->begin([item] { return DocumentInteractionSheet::lookUp(item); }, weakly(this, show));
 }
 
 void LookwellItemController::showMoveTarget(const Button&)

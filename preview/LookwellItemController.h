@@ -4,6 +4,7 @@
 #pragma once
 
 #include "kit/values/Menu.h"
+#include "platform/LatestLook.h"
 #include "platform/Url.h"
 #include "screens/preview/PreviewController.h"
 
@@ -65,6 +66,7 @@ private:
         const screens::PreviewController& controller, const platform::Url& item) override;
 
     std::weak_ptr<PreviewItemManager> _itemManager;
+    const std::shared_ptr<platform::LatestLook> _look = std::make_shared<platform::LatestLook>();
     std::optional<std::vector<platform::Url>> _arrayOfDocuments;
     kit::Menu _previewActionItems;
 };

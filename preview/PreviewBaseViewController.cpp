@@ -5,7 +5,6 @@
 
 #include "items/DRItem.h"
 #include "items/LaunchUtils.h"
-#include "items/UrlResolution.h"
 #include "kit/controllers/NavigationController.h"
 #include "kit/controllers/NavigationItem.h"
 #include "kit/controllers/Window.h"
@@ -244,8 +243,13 @@ void PreviewBaseViewController::openInDefaultApp()
     op.userAction("Pressed Open in <app>");
     const auto manager = itemManager();
     const auto item = manager ? manager->item() : nullptr;
-    if (item && !LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(item->url(), self(), true))
-        op.warning("Failed to open document %@ in default app", item->url());
+    if (!item)
+        return;
+    lookThen([url = item->url()] { return LaunchUtils::factsOf(url); },
+        [url = item->url()](PreviewBaseViewController& self, const LaunchUtils::DocumentFacts& facts) {
+            if (!LaunchUtils::openInDefaultAppFactsViewControllerRequireOpenIn(url, facts, self.self(), true))
+                op.warning("Failed to open document %@ in default app", url);
+        });
 }
 
 void PreviewBaseViewController::showWarningAndDeleteDocument(const Button&)
@@ -264,19 +268,24 @@ void PreviewBaseViewController::showDocumentActivities(const Button&)
     const auto item = manager ? manager->item() : nullptr;
     if (!item)
         return;
-    auto url = item->resolvedURL();
+    const auto url = item->resolvedURL();
     if (!url) {
         op.warning("showDocumentActivities: url is wrong class: %{public}@", "(null)");
         return;
     }
     op.info("showDocumentActivities: %@", *url);
-    if (auto resolved = trw_URLByResolvingBookmark(*url); resolved && *resolved != *url) {
-        op.info("URL resolved to %@", *resolved);
-        url = std::move(resolved);
-    }
-    const auto sheet = DocumentInteractionSheet::interactionControllerWithURL(*url);
-    manager->setDocumentInteractionController(sheet);
-    sheet->presentOptionsMenuFromBarButtonItem(self(), _barButtonActionItem, true);
+    lookThen([url = *url] { return LaunchUtils::sharedItemAt(url); },
+        [url = *url](PreviewBaseViewController& self, const LaunchUtils::SharedItem& shared) {
+            if (shared.url != url)
+                op.info("URL resolved to %@", shared.url);
+            const auto shownIn = self.itemManager();
+            if (!shownIn)
+                return;
+            const auto sheet =
+                DocumentInteractionSheet::interactionControllerWithURLFacts(shared.url, shared.facts);
+            shownIn->setDocumentInteractionController(sheet);
+            sheet->presentOptionsMenuFromBarButtonItem(self.self(), self._barButtonActionItem, true);
+        });
 }
 
 void PreviewBaseViewController::showMoveTarget(const Button&)

@@ -7,9 +7,12 @@
 #include "kit/controllers/ViewController.h"
 #include "kit/layout/LayoutConstraint.h"
 #include "platform/Geometry.h"
+#include "platform/LatestLook.h"
+#include "platform/Weakly.h"
 #include "preview/PreviewMode.h"
 
 #include <memory>
+#include <utility>
 
 namespace kit {
 class Button;
@@ -91,8 +94,21 @@ private:
     Button wrappedOpenInButton();
     void enableButtons();
     bool hasItemURL() const;
+    /// Looks at the disk on another thread and goes on with what was found, unless a person has asked for
+    /// something else since or has left the screen.
+    template <typename Look, typename Then>
+    void lookThen(Look look, Then then)
+    {
+        _look->begin(std::move(look),
+            platform::weakly(
+                this, [then = std::move(then)](PreviewBaseViewController& self, const auto& found) {
+                    if (self.isVisible())
+                        then(self, found);
+                }));
+    }
 
     std::weak_ptr<PreviewItemManager> _itemManager;
+    const std::shared_ptr<platform::LatestLook> _look = std::make_shared<platform::LatestLook>();
     int _mode = PreviewModeDetails;
     std::shared_ptr<kit::ScrollView> _scrollView;
     std::shared_ptr<kit::View> _contentView, _wrapperView;

@@ -9,7 +9,7 @@
 #include "drawing/PieProgressIndicatorView.h"
 #include "drawing/ThumbnailImageView.h"
 #include "items/DRItem.h"
-#include "items/LaunchUtils.h"
+#include "kit/controllers/NavigationController.h"
 #include "kit/controllers/NavigationItem.h"
 #include "kit/values/Screen.h"
 #include "kit/views/Button.h"
@@ -48,8 +48,8 @@ std::shared_ptr<DRItem> PreviewDetailsViewController::item() const
 void PreviewDetailsViewController::viewDidLoad()
 {
     PreviewBaseViewController::viewDidLoad();
-    makeOpenInAppButton();
     setupViewsAndConstraints();
+    lookUpApp();
     offerMenu();
     view()->addGestureRecognizer(std::make_shared<kit::TapRecognizer>(
         weakly(this, [](PreviewDetailsViewController& self) { self.viewWasTapped(); })));
@@ -93,15 +93,25 @@ void PreviewDetailsViewController::traitsDidChange(const kit::TraitCollection& p
     PreviewBaseViewController::traitsDidChange(previous);
 }
 
-void PreviewDetailsViewController::makeOpenInAppButton()
+void PreviewDetailsViewController::lookUpApp()
 {
-    const auto shown = item();
-    const auto name =
-        shown ? LaunchUtils::defaultAppNameForDocumentRequireOpenIn(shown->url(), true) : std::nullopt;
+    if (const auto shown = item())
+        _appLook->begin([url = shown->url()] { return LaunchUtils::factsOf(url); },
+            weakly(this, &PreviewDetailsViewController::offerApp));
+}
+
+void PreviewDetailsViewController::offerApp(const LaunchUtils::DocumentFacts& facts)
+{
+    const auto name = LaunchUtils::defaultAppNameForDocumentFactsRequireOpenIn(facts, true);
     if (!name)
         return;
     _openInAppButton = std::make_shared<kit::Button>(localized("Open in “%@”", {*name}));
     _openInAppButton->setAction(weakly(this, &PreviewBaseViewController::openInDefaultApp));
+    placeOpenInAppButton();
+    // The bars were made without the button if the disk was slow.
+    const auto stack = navigationController();
+    if (barButtonActionItem() && stack && stack->topViewController() == self())
+        configureButtons();
 }
 
 bool PreviewDetailsViewController::shouldDisplayOpenInAppButtonInView() const

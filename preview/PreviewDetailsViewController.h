@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "items/LaunchUtils.h"
 #include "kit/layout/LayoutConstraint.h"
 #include "kit/values/Animation.h"
 #include "kit/values/Menu.h"
@@ -52,7 +53,7 @@ public:
     const Stack& mainStackView() const { return _mainStackView; }
     const Stack& filenameStackView() const { return _filenameStackView; }
     const Stack& fileDetailsView() const { return _fileDetailsView; }
-    /// Answers null without an app that opens the document.
+    /// Answers null without an app that opens the document, and until it was looked up.
     const std::shared_ptr<kit::Button>& openInAppButton() const { return _openInAppButton; }
     /// The field's width is that of its stack and this constant: -16 at rest, 0 while the name is edited.
     const auto& filenameTextFieldFullWidthConstraint() const { return _filenameTextFieldFullWidthConstraint; }
@@ -134,7 +135,8 @@ private:
     void offerMenu();
     kit::Menu menu();
     void editTags();
-    void makeOpenInAppButton();
+    void lookUpApp();
+    void offerApp(const LaunchUtils::DocumentFacts& facts);
     void placeOpenInAppButton();
     void makeDownloadView();
     void showDownload();
@@ -158,6 +160,7 @@ private:
     bool _endsWhenRenamed = false; ///< the user asked for the end of the editing
     std::vector<platform::Observation> _keyboardObservations;
     platform::Observation _onDownloads;
+    const std::shared_ptr<platform::LatestLook> _appLook = std::make_shared<platform::LatestLook>();
 };
 
 } // namespace tarrow

@@ -10,6 +10,7 @@
 #include "platform/Log.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/UIUtils.h"
+#include "screens/DrivePlaces.h"
 
 namespace tarrow {
 
@@ -51,13 +52,24 @@ void PreviewItemManager::showWarningAndDeleteDocumentBarButton(
 {
     static constexpr Operation op{"-[PreviewItemManager showWarningAndDeleteDocument:barButton:]"};
     const auto url = itemURL();
-    UIUtils::showDeleteWarningAlertHasContainerViewControllerUsingViewUsingButtonCompletion(
-        url ? std::vector{*url} : std::vector<Url>(), false, screen, nullptr, button,
-        [self = shared_from_this(), screen, asked = AccountSession()](const auto&, bool cancelled) {
-            op.userAction(cancelled ? "Delete was Cancelled (itemMgr)" : "Delete was Confirmed (itemMgr)");
-            if (!cancelled && asked.isCurrent())
-                self->removeItem(screen, asked);
+    const auto answered = [screen, asked = AccountSession()](PreviewItemManager& self, bool cancelled) {
+        op.userAction(cancelled ? "Delete was Cancelled (itemMgr)" : "Delete was Confirmed (itemMgr)");
+        if (!cancelled && asked.isCurrent())
+            self.removeItem(screen, asked);
+    };
+    lookThen(
+        screen, [url] { return url ? UIUtils::messageForDeletePrompt({*url}) : std::nullopt; },
+        [screen, button, answered](PreviewItemManager& self, const std::optional<std::string>& message) {
+            UIUtils::showDeleteWarningAlertMessageViewControllerUsingViewUsingButtonCompletion(message,
+                screen, nullptr, button,
+                [self = self.shared_from_this(), answered](
+                    const auto&, bool cancelled) { answered(*self, cancelled); });
         });
+}
+
+std::shared_ptr<kit::NavigationController> PreviewItemManager::stackOf(const Screen& screen)
+{
+    return screen ? screen->navigationController() : nullptr;
 }
 
 void PreviewItemManager::removeItem(const Screen& screen, const AccountSession& asked)
@@ -82,16 +94,26 @@ void PreviewItemManager::showMoveTarget(const Screen& screen)
     static constexpr Operation op{"-[PreviewItemManager showMoveTarget:]"};
     op.info("Pressed Move (itemMgr)");
     const auto url = itemURL();
-    const auto presenter = screen ? screen->navigationController() : nullptr;
+    const auto presenter = stackOf(screen);
     if (!url || !presenter)
         return;
+    struct Facts {
+        MoveTargetScope scope;
+        std::shared_ptr<const screens::DrivePlaces> places;
+    };
     const std::vector items{*url};
-    const auto picker = MoveTargetPicker::initWithItemsScope(
-        items, trw_canCrossZoneMoveURLs(items) ? MoveTargetScope::AllContainers : MoveTargetScope::Container);
-    picker->setDelegate(weak_from_this());
-    _moveAsked.emplace();
-    picker->setPresentationStyle(kit::PresentationStyle::OverCurrentContext);
-    presenter->presentViewController(picker, true, [] { op.debug("Presented moveTarget"); });
+    const auto look = [items, shown = MoveTargetPicker::foldersToLookUp(items)] {
+        const bool mayLeave = trw_canCrossZoneMoveURLs(items);
+        return Facts{mayLeave ? MoveTargetScope::AllContainers : MoveTargetScope::Container,
+            screens::DrivePlaces::lookUp(shown)};
+    };
+    lookThen(screen, look, [items, presenter](PreviewItemManager& self, const Facts& facts) {
+        const auto picker = MoveTargetPicker::initWithItemsScopePlaces(items, facts.scope, facts.places);
+        picker->setDelegate(self.weak_from_this());
+        self._moveAsked.emplace();
+        picker->setPresentationStyle(kit::PresentationStyle::OverCurrentContext);
+        presenter->presentViewController(picker, true, [] { op.debug("Presented moveTarget"); });
+    });
 }
 
 void PreviewItemManager::documentTargetSelectionControllerDidSelectItemAtURL(

@@ -246,6 +246,12 @@ void PreviewItemManager::replaceLastViewController(const Screen& screen)
 
 std::optional<PreviewItemManager::ListStack> PreviewItemManager::dlcStackForURL(const Url& url)
 {
+    const auto folders = foldersForURL(url);
+    return folders.empty() ? std::nullopt : std::optional(DocumentListController::listsOf(folders));
+}
+
+std::vector<screens::TitledFolder> PreviewItemManager::foldersForURL(const Url& url)
+{
     static constexpr Operation op{"+[PreviewItemManager dlcStackForURL:]"};
     auto folder = url;
     auto item = DRItem::initWithURL(folder);
@@ -255,13 +261,12 @@ std::optional<PreviewItemManager::ListStack> PreviewItemManager::dlcStackForURL(
     }
     if (!item || !item->isDirectory()) {
         op.error("Can't build DLC stack, can't get directory: %@", folder);
-        return std::nullopt;
+        return {};
     }
-    auto lists = DocumentListController::hierarchyForURL(folder);
-    if (!lists.empty())
-        return lists;
-    op.error(": Couldn't build DLC stack for %@.", folder);
-    return std::nullopt;
+    auto folders = screens::titledFoldersDownTo(folder);
+    if (folders.empty())
+        op.error(": Couldn't build DLC stack for %@.", folder);
+    return folders;
 }
 
 bool PreviewItemManager::warpToNewURL(const Url& url)

@@ -8,8 +8,10 @@
 #include "kit/controllers/ViewController.h"
 #include "platform/Date.h"
 #include "platform/FilePresenter.h"
+#include "platform/LatestLook.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Url.h"
+#include "platform/Weakly.h"
 #include "preview/PreviewMode.h"
 #include "screens/list/DocumentListController.h"
 #include "screens/move/MoveTargetPicker.h"
@@ -18,6 +20,7 @@
 #include <mutex>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace platform {
@@ -104,6 +107,8 @@ public:
     /// Answers the lists from the drive's top level to the folder of a URL, or nothing when the URL leads to
     /// no folder of the drive.
     static std::optional<ListStack> dlcStackForURL(const platform::Url& url);
+    /// Answers the folders of those lists, with their titles. Any thread.
+    static std::vector<screens::TitledFolder> foldersForURL(const platform::Url& url);
     /// Replaces the whole stack by the lists that lead to a URL and, for a document, its preview. Answers
     /// false, and changes nothing, when no lists lead there.
     bool warpToNewURL(const platform::Url& url);
@@ -150,6 +155,19 @@ private:
     void clearRefreshPending();
     void refreshScreens(const std::shared_ptr<DRItem>& before, const DRItem& item, bool isNewer);
     void removeItem(const Screen& screen, const AccountSession& asked);
+    /// Looks at the disk on another thread and goes on with what was found, unless a person has asked for
+    /// something else since, has left the screen, or the screen shows another item now.
+    template <typename Look, typename Then>
+    void lookThen(const Screen& screen, Look look, Then then)
+    {
+        const auto stillShown = [screen, url = itemURL(), stack = stackOf(screen), then = std::move(then)](
+                                    PreviewItemManager& self, const auto& found) {
+            if (self.itemURL() == url && stackOf(screen) == stack)
+                then(self, found);
+        };
+        _look->begin(std::move(look), platform::weakly(this, stillShown));
+    }
+    static std::shared_ptr<kit::NavigationController> stackOf(const Screen& screen);
 
     int _mode = PreviewModeQuick;
     std::shared_ptr<platform::OperationQueue> _fcQueue;
@@ -159,6 +177,7 @@ private:
     std::weak_ptr<kit::NavigationController> _navigationController;
     std::vector<platform::Observation> _observations;
     std::weak_ptr<UndoHistory> _undoHistory;
+    const std::shared_ptr<platform::LatestLook> _look = std::make_shared<platform::LatestLook>();
     std::optional<AccountSession> _moveAsked; ///< who was asked last for the destination of a move
     std::optional<platform::Url> _movedTo; ///< where the user of this program has moved the item last
 

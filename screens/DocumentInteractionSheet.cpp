@@ -43,23 +43,29 @@ std::vector<AppHandle> appsFor(const Url& document)
 std::shared_ptr<DocumentInteractionSheet> DocumentInteractionSheet::interactionControllerWithURL(
     const Url& url)
 {
-    return std::make_shared<DocumentInteractionSheet>(url);
+    return interactionControllerWithURLFacts(url, lookUp(url));
 }
 
-DocumentInteractionSheet::DocumentInteractionSheet(Url url)
+std::shared_ptr<DocumentInteractionSheet> DocumentInteractionSheet::interactionControllerWithURLFacts(
+    const Url& url, ItemFacts facts)
+{
+    return std::make_shared<DocumentInteractionSheet>(url, std::move(facts));
+}
+
+DocumentInteractionSheet::ItemFacts DocumentInteractionSheet::lookUp(const Url& url)
+{
+    return {folderTitle(url), services().fileSystem().typeOfItem(url.path())};
+}
+
+DocumentInteractionSheet::DocumentInteractionSheet(Url url, ItemFacts facts)
     : _url(std::move(url))
-    , _name(folderTitle(_url))
+    , _facts(std::move(facts))
 {
-}
-
-bool DocumentInteractionSheet::contentIsHere() const
-{
-    return services().fileSystem().typeOfItem(_url.path()).has_value();
 }
 
 bool DocumentInteractionSheet::openDocumentInPlaceInApp(const AppHandle& app) const
 {
-    return services().appRegistry().openInPlace(_url, app);
+    return contentIsHere() && services().appRegistry().openInPlace(_url, app);
 }
 
 void DocumentInteractionSheet::presentOptionsMenuFromRectInView(
@@ -96,7 +102,7 @@ void DocumentInteractionSheet::showMenu(const std::shared_ptr<AlertController>& 
 std::shared_ptr<AlertController> DocumentInteractionSheet::makeMenu(Apps apps)
 {
     const bool isHere = contentIsHere();
-    const auto menu = std::make_shared<AlertController>(_name,
+    const auto menu = std::make_shared<AlertController>(_facts.name,
         isHere ? std::string() : localized("The content is in the cloud. Open the document to download it."),
         kit::AlertStyle::ActionSheet);
     for (std::size_t i = 0; i < std::min(apps.size(), directApps); ++i)
@@ -106,7 +112,7 @@ std::shared_ptr<AlertController> DocumentInteractionSheet::makeMenu(Apps apps)
             [self = shared_from_this(), others = Apps(apps.begin() + directApps, apps.end())](
                 const auto&) { self->showMenu(self->makeAppMenu(others), true); }));
     auto& sharing = services().documentSharing();
-    const bool isDocument = services().fileSystem().typeOfItem(_url.path()) == FileType::Regular;
+    const bool isDocument = _facts.type == FileType::Regular;
     if (isDocument && sharing.canSendByMail())
         add(*menu, localized("Send by Mail"), &DocumentInteractionSheet::sendByMail);
     add(*menu, localized("Copy Path"), &DocumentInteractionSheet::copyPath);
@@ -121,7 +127,8 @@ std::shared_ptr<AlertController> DocumentInteractionSheet::makeMenu(Apps apps)
 
 std::shared_ptr<AlertController> DocumentInteractionSheet::makeAppMenu(const Apps& apps)
 {
-    const auto menu = std::make_shared<AlertController>(_name, std::string(), kit::AlertStyle::ActionSheet);
+    const auto menu =
+        std::make_shared<AlertController>(_facts.name, std::string(), kit::AlertStyle::ActionSheet);
     for (const auto& app : apps)
         addApp(*menu, app);
     addCancel(*menu);
@@ -157,9 +164,14 @@ void DocumentInteractionSheet::ended()
 
 void DocumentInteractionSheet::openIn(const AppHandle& app)
 {
-    if (!openDocumentInPlaceInApp(app))
-        showFailure(localized("%@ could not be started", {app.localizedName}), {});
-    ended();
+    // The content may have come or gone while the menu was shown.
+    _look->begin([url = _url] { return services().fileSystem().typeOfItem(url.path()); },
+        [self = shared_from_this(), app](std::optional<FileType> type) {
+            self->_facts.type = type;
+            if (!self->openDocumentInPlaceInApp(app))
+                self->showFailure(localized("%@ could not be started", {app.localizedName}), {});
+            self->ended();
+        });
 }
 
 void DocumentInteractionSheet::sendByMail()
@@ -191,7 +203,7 @@ std::function<void(const std::optional<Error>&)> DocumentInteractionSheet::repor
 {
     return [self = shared_from_this()](const std::optional<Error>& error) {
         if (error)
-            self->showFailure(self->_name, errorWords(*error));
+            self->showFailure(self->_facts.name, errorWords(*error));
     };
 }
 

@@ -6,7 +6,9 @@
 #include "kit/controllers/PopoverAnchor.h"
 #include "platform/AppRegistry.h"
 #include "platform/Error.h"
+#include "platform/FileSystem.h"
 #include "platform/Geometry.h"
+#include "platform/LatestLook.h"
 #include "platform/Url.h"
 #include "screens/PlatformNames.h"
 
@@ -46,20 +48,31 @@ public:
     /// So many apps have a line of their own in the menu; further ones stand behind a line "Other Apps…".
     static constexpr std::size_t directApps = 3;
 
+    /// What the disk says about an item.
+    struct ItemFacts {
+        std::string name; ///< for people
+        std::optional<FileType> type; ///< of what is here; absent for an item that is not downloaded
+    };
+    /// Looks them up. Any thread.
+    static ItemFacts lookUp(const Url& url);
+
     static std::shared_ptr<DocumentInteractionSheet> interactionControllerWithURL(const Url& url);
-    explicit DocumentInteractionSheet(Url url);
+    /// Makes the same with facts that were looked up, and looks at nothing.
+    static std::shared_ptr<DocumentInteractionSheet> interactionControllerWithURLFacts(
+        const Url& url, ItemFacts facts);
+    DocumentInteractionSheet(Url url, ItemFacts facts);
 
     const Url& url() const { return _url; }
     /// The heading of the menu. It is the item's display name until another one is set.
-    const std::string& name() const { return _name; }
-    void setName(std::string name) { _name = std::move(name); }
+    const std::string& name() const { return _facts.name; }
+    void setName(std::string name) { _facts.name = std::move(name); }
     void setDelegate(std::weak_ptr<DocumentInteractionSheetDelegate> delegate)
     {
         _delegate = std::move(delegate);
     }
 
-    /// Asks an app to open the document in its place. Answers false when the content is not downloaded or the
-    /// app cannot be started.
+    /// Asks an app to open the document in its place. Answers false when the content was not downloaded at
+    /// the look, or the app cannot be started.
     bool openDocumentInPlaceInApp(const AppHandle& app) const;
 
     /// Shows the menu over a screen, pointing at a rectangle of a view.
@@ -81,7 +94,7 @@ private:
     void addApp(kit::AlertController& menu, const AppHandle& app);
     void add(kit::AlertController& menu, const std::string& title, Action action);
     void addCancel(kit::AlertController& menu);
-    bool contentIsHere() const;
+    bool contentIsHere() const { return _facts.type.has_value(); }
     std::function<void(const std::optional<Error>&)> reportFailure();
 
     void openIn(const AppHandle& app);
@@ -94,7 +107,8 @@ private:
     void ended();
 
     Url _url;
-    std::string _name;
+    ItemFacts _facts;
+    const std::shared_ptr<platform::LatestLook> _look = std::make_shared<platform::LatestLook>();
     std::weak_ptr<DocumentInteractionSheetDelegate> _delegate;
     std::weak_ptr<kit::ViewController> _presenter;
     kit::PopoverAnchor _anchor;

@@ -76,6 +76,16 @@ std::vector<Url> foldersDownTo(const Url& folder)
     return foldersBetween(*root, *(*container)->documentsURL, folder);
 }
 
+std::vector<TitledFolder> titledFoldersDownTo(const Url& folder)
+{
+    std::vector<TitledFolder> titled;
+    for (auto& place : foldersDownTo(folder)) {
+        auto title = folderTitle(place);
+        titled.push_back({std::move(place), std::move(title)});
+    }
+    return titled;
+}
+
 std::vector<Url> foldersBetween(const Url& root, const Url& documents, const Url& folder)
 {
     if (!folder.isWithin(documents))

@@ -39,8 +39,16 @@ std::vector<FolderSnapshot::ExtraItem> extraItemsOf(const Url& folder);
 /// container nor in a library.
 std::vector<Url> foldersDownTo(const Url& folder);
 
-/// Answers the same for a known top level and a known documents folder of the folder's container, without a
-/// look at the disk.
+/// A folder and the title of its list.
+struct TitledFolder {
+    Url folder;
+    std::string title;
+};
+/// Answers these folders with their titles.
+std::vector<TitledFolder> titledFoldersDownTo(const Url& folder);
+
+/// Answers the folders for a known top level and a known documents folder of the folder's container, without
+/// a look at the disk.
 std::vector<Url> foldersBetween(const Url& root, const Url& documents, const Url& folder);
 
 } // namespace screens

@@ -324,6 +324,18 @@ bool DocumentListController::peekAt(const RowItem& item)
     const auto told = delegate();
     if (!told || _editing)
         return false;
+    // A slow disk leaves open for now whether there is something to show.
+    const auto isShown = std::make_shared<bool>(true);
+    told->documentListControllerPrepareToPreviewItemAtURL(self(), item.url,
+        weakly(this, [item, isShown](DocumentListController& list) { *isShown = list.showPeekAt(item); }));
+    return *isShown;
+}
+
+bool DocumentListController::showPeekAt(const RowItem& item)
+{
+    const auto told = delegate();
+    if (!told || _editing)
+        return false;
     const auto screen = told->documentListControllerViewControllerForPreviewingItemAtURL(self(), item.url);
     if (!screen)
         return false;

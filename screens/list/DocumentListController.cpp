@@ -57,9 +57,15 @@ std::shared_ptr<DocumentListController> DocumentListController::initWithURLTitle
 
 std::vector<std::shared_ptr<DocumentListController>> DocumentListController::hierarchyForURL(const Url& url)
 {
+    return listsOf(titledFoldersDownTo(url));
+}
+
+std::vector<std::shared_ptr<DocumentListController>> DocumentListController::listsOf(
+    const std::vector<TitledFolder>& folders)
+{
     std::vector<std::shared_ptr<DocumentListController>> lists;
-    for (const auto& folder : foldersDownTo(url))
-        lists.push_back(initWithURL(folder));
+    for (const auto& [folder, title] : folders)
+        lists.push_back(initWithURLTitle(folder, title));
     return lists;
 }
 

@@ -8,6 +8,7 @@
 #include "platform/Error.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
+#include "screens/FolderPlaces.h"
 #include "screens/PlatformNames.h"
 #include "screens/list/DocumentListAction.h"
 #include "screens/list/DocumentListControllerDelegate.h"
@@ -52,6 +53,9 @@ public:
     /// Answers a new list for each folder from the drive's top level down to the given one, in this order.
     /// Answers nothing when the folder lies neither in the default container nor in an app library.
     static std::vector<std::shared_ptr<DocumentListController>> hierarchyForURL(const Url& url);
+    /// Answers a new list for each of these folders, and looks at nothing.
+    static std::vector<std::shared_ptr<DocumentListController>> listsOf(
+        const std::vector<TitledFolder>& folders);
 
     /// Derived classes call this. Without a folder the list stays empty.
     explicit DocumentListController(std::optional<Url> folder);
@@ -174,6 +178,7 @@ private:
     kit::Menu menuFor(const RowItem& item);
     bool obey(kit::RowCommand command, const RowItem& item);
     bool peekAt(const RowItem& item);
+    bool showPeekAt(const RowItem& item);
     void peekEnded();
     /// Answers the latest peek while it is shown, else null.
     std::shared_ptr<kit::AlertController> shownPeek() const;

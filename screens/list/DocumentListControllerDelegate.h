@@ -45,6 +45,13 @@ public:
     /// edit mode; the list selects them once it is editing.
     virtual void documentListControllerRequestsEditing(const List&) { }
 
+    /// The user holds an item for a peek. The delegate looks at the item, and calls `ready` on the main
+    /// thread when it can answer the next question without delay. It need not call it.
+    virtual void documentListControllerPrepareToPreviewItemAtURL(
+        const List&, const Url&, const Completion& ready)
+    {
+        ready();
+    }
     /// Answers the screen for a peek at an item, or null for none.
     virtual std::shared_ptr<kit::ViewController> documentListControllerViewControllerForPreviewingItemAtURL(
         const List&, const Url&)

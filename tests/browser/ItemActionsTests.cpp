@@ -276,6 +276,7 @@ TEST_F(ItemActionsTest, TheShareSheetPointsAtTheMiddleOfItsView)
     launch();
     const auto view = std::make_shared<kit::View>(platform::Rect{0, 0, 300, 60});
     browser->showDICUrlCompletion(view, url("a.txt.trwref"), {});
+    settle();
     EXPECT_EQ(browser->documentInteractionController()->url(), target);
     EXPECT_EQ(log->count("INFO URL resolved to " + logText(target)), 1);
     ASSERT_NE(alert(), nullptr);
@@ -288,6 +289,7 @@ TEST_F(ItemActionsTest, TheShareSheetPointsAtTheMiddleOfItsView)
 
     perform(DocumentListAction::Share, recipes);
     EXPECT_EQ(completions, 1) << "the list need not wait for the sheet";
+    settle();
     EXPECT_EQ(browser->documentInteractionController()->name(), "app.recipes");
 }
 

@@ -7,6 +7,9 @@
 #include "kit/views/ListView.h"
 #include "kit/views/TextField.h"
 #include "platform/Log.h"
+#include "preview/LookwellItemController.h"
+#include "preview/PreviewDetailsViewController.h"
+#include "preview/PreviewItemManager.h"
 #include "prompts/DriveStatusLabelView.h"
 #include "prompts/FilenamePrompt.h"
 #include "prompts/SimpleTextViewController.h"
@@ -271,6 +274,10 @@ TEST_F(SlowDiskTest, NoTapLooksAtAnItem)
                 topList()->setSelectedItems({note, url("Documents")});
             }},
         {"new folder", [this] { browser->promtForNewFolderAndCreate(nullptr); }},
+        {"share", [&] { perform(DocumentListAction::Share, note); }},
+        {"peek at a folder", [this] { topList()->listView()->holdRow(2); }},
+        {"peek at a document", [this] { topList()->listView()->holdRow(3); }},
+        {"pop", [&] { browser->knopPopToURL(note); }},
     };
     // Lines for a person who looks for a fault name the types of folders, which are read.
     platform::setLogLevel(platform::LogLevel::Info);
@@ -283,6 +290,63 @@ TEST_F(SlowDiskTest, NoTapLooksAtAnItem)
         EXPECT_EQ(cloud->looksAtItems, 0);
         settle();
     }
+}
+
+TEST_F(SlowDiskTest, NoTapInAPreviewLooksAtAnItem)
+{
+    const auto note = DRItem::initWithURL(write("a.txt"));
+    const auto details = [this] {
+        return std::dynamic_pointer_cast<PreviewDetailsViewController>(browser->topViewController());
+    };
+    const auto quick = LookwellItemController::defaultController();
+    struct Row {
+        const char* name;
+        int mode;
+        std::function<void()> tap;
+        const char* title; ///< of the first action that is then offered; empty: none
+    };
+    apps->available = {{"Owner", {SimulatedApps::make("editor")}}};
+    const Row rows[] = {
+        {"details", PreviewModeDetails, [] {}, ""},
+        {"share", PreviewModeDetails, [&] { details()->showDocumentActivities(nullptr); },
+            "Open in The editor"},
+        {"delete", PreviewModeDetails, [&] { details()->showWarningAndDeleteDocument(nullptr); },
+            "Delete from Tarrow Drive"},
+        {"open", PreviewModeDetails, [&] { details()->openInDefaultApp(); }, ""},
+        {"delete in a quick preview", PreviewModeQuick, [&] { quick->showWarningAndDeleteDocument(nullptr); },
+            "Delete from Tarrow Drive"},
+        {"move in a quick preview", PreviewModeQuick, [&] { quick->showMoveTarget(nullptr); }, ""},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.name);
+        launch();
+        cloud->looksAtItems = 0;
+        browser->showPreviewPreviewMode(note, row.mode);
+        EXPECT_LE(cloud->looksAtItems, 1) << "the hand-over looks at the name";
+        settle();
+        cloud->looksAtItems = 0;
+        row.tap();
+        EXPECT_EQ(cloud->looksAtItems, 0);
+        settle();
+        EXPECT_EQ(alert() ? alert()->actions().front()->title() : "", row.title);
+    }
+    EXPECT_THAT(apps->opened, testing::SizeIs(1));
+}
+
+TEST_F(SlowDiskTest, APeekThatIsOpenedKeepsItsPreview)
+{
+    write("a.txt");
+    launch();
+    topList()->listView()->holdRow(2);
+    settle();
+    ASSERT_NE(alert(), nullptr);
+    ASSERT_EQ(alert()->actions().front()->title(), "Open");
+    alert()->press(alert()->actions().front());
+    EXPECT_THAT(stack(), testing::SizeIs(1)) << "the disk is slow";
+    settle();
+    EXPECT_EQ(stack().back(), "*");
+    ASSERT_NE(browser->itemManager(), nullptr);
+    EXPECT_TRUE(browser->itemManager()->filePresenterRegistered());
 }
 
 TEST_F(SlowDiskTest, WhatIsAskedLastCounts)

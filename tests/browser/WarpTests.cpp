@@ -55,7 +55,11 @@ TEST_F(WarpTest, AQuestionThatIsOpenIsDroppedUnanswered)
     write("Folder/second.txt");
     launch();
     open(first);
-    LookwellItemController::defaultController()->showWarningAndDeleteDocument(nullptr);
+    const auto askToDelete = [this] {
+        LookwellItemController::defaultController()->showWarningAndDeleteDocument(nullptr);
+        settle();
+    };
+    askToDelete();
     ASSERT_NE(alert(), nullptr);
     EXPECT_TRUE(warp("Folder/second.txt"));
     EXPECT_EQ(alert(), nullptr);
@@ -63,7 +67,7 @@ TEST_F(WarpTest, AQuestionThatIsOpenIsDroppedUnanswered)
     EXPECT_TRUE(FileUtils::exists(first));
 
     // A refused request closes the question as well, and leaves the rest as it is.
-    LookwellItemController::defaultController()->showWarningAndDeleteDocument(nullptr);
+    askToDelete();
     ASSERT_NE(alert(), nullptr);
     EXPECT_FALSE(warp("../../trash/second.txt"));
     EXPECT_EQ(alert(), nullptr);

@@ -57,6 +57,19 @@ TEST_F(LaunchUtilsTest, OnlyAnOwnerThatOpensInPlaceIsADefaultApp)
                 "DEBUG UTI public.plain-text: Found non-Owner 'None' app The editor (editor)"}));
 }
 
+TEST_F(LaunchUtilsTest, AnAppIsGivenOnlyWhatIsHere)
+{
+    setOwners({painter});
+    const auto open = [](const Url& url) {
+        return LaunchUtils::openInDefaultAppViewControllerRequireOpenIn(url, nullptr, true);
+    };
+    EXPECT_FALSE(open(writePromise("far.txt", {})));
+    EXPECT_THAT(apps->opened, IsEmpty());
+    const auto note = writeDocument("note.txt");
+    EXPECT_TRUE(open(note));
+    EXPECT_THAT(apps->opened, ElementsAre(SimulatedApps::Opened{note, "painter"}));
+}
+
 TEST_F(LaunchUtilsTest, WhatThePreviewShowsWellStaysInTheDefaultContainer)
 {
     const auto library = describeContainer("box", R"({"owningApps": ["painter"]})");

@@ -121,6 +121,7 @@ TEST_F(Details, TheAppThatOpensTheDocumentIsNamedWhereThereIsRoom)
     EXPECT_EQ(facts().back(), details->openInAppButton());
     EXPECT_EQ(bar().rightItems().size(), 5U);
     EXPECT_TRUE(details->openInAppButton()->press());
+    drive.settle();
     EXPECT_THAT(apps->opened, ElementsAre(testing_support::SimulatedApps::Opened{url, "editor"}));
 
     resize({360, 640}, phone);

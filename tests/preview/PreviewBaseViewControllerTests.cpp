@@ -136,6 +136,7 @@ TEST_F(Base, TheOpenButtonStandsInAPhonesBar)
     screen->configureButtons();
     ASSERT_EQ(screen->navigationItem().rightItems().size(), 1U);
     EXPECT_TRUE(screen->button->press());
+    drive.settle();
     EXPECT_EQ(drive.log->count(
                   "WARNING Failed to open document " + logText(drive.url("Notes.txt")) + " in default app"),
         1U)
@@ -149,12 +150,14 @@ TEST_F(Base, SharesTheDocumentThatTheItemStandsForAndAsksBeforeItDeletes)
 {
     const auto screen = show(document("Notes.txt"));
     EXPECT_TRUE(screen->barButtonActionItem()->press());
+    drive.settle();
     const auto sheet = manager->documentInteractionController();
     ASSERT_TRUE(sheet);
     EXPECT_EQ(sheet->url(), drive.url("Notes.txt"));
     EXPECT_TRUE(alert());
     navigation->dismissViewController(false);
     EXPECT_TRUE(screen->barButtonDeleteItem()->press());
+    drive.settle();
     ASSERT_TRUE(alert());
     EXPECT_EQ(std::get<std::weak_ptr<kit::BarButtonItem>>(alert()->popoverAnchor()).lock(),
         screen->barButtonDeleteItem());

@@ -290,6 +290,7 @@ TEST_F(Presenter, DeletesWhenTheUserConfirms)
     const auto url = open("Notes.txt");
     const auto press = [&](std::size_t action) {
         preview->additionalRightBarButtonItems().front()->press();
+        drive.settle();
         ASSERT_TRUE(alert());
         EXPECT_THAT(alert()->message(), HasSubstr("Notes.txt"));
         EXPECT_TRUE(alert()->press(action));
@@ -317,6 +318,7 @@ TEST_F(Presenter, SaysWhyADocumentCouldNotBeDeletedOrMovedAlsoWhenThePreviewWasL
             const auto url = open("Notes.txt");
             const auto& buttons = preview->additionalRightBarButtonItems();
             (isMoved ? buttons.back() : buttons.front())->press();
+            drive.settle();
             manager->unregisterAsFilePresenter();
             std::filesystem::remove(url.path());
             if (isMoved)

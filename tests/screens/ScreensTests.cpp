@@ -46,7 +46,11 @@ protected:
             found.push_back(action->title());
         return found;
     }
-    void choose(const std::string& title) const { pressTitled(alert(), title); }
+    void choose(const std::string& title) const
+    {
+        pressTitled(alert(), title);
+        drive.settle();
+    }
 
     std::shared_ptr<kit::ViewController> screen = std::make_shared<kit::ViewController>();
     std::shared_ptr<DocumentInteractionSheet> sheet;

@@ -8,7 +8,6 @@
 
 #include <gio/gdesktopappinfo.h>
 #include <gio/gio.h>
-#include <unistd.h>
 
 #include <algorithm>
 
@@ -156,7 +155,7 @@ bool GioAppRegistry::openInPlace(const Url& document, const AppHandle& app)
 {
     static constexpr platform::Operation op{"-[GioAppRegistry openInPlace:app:]"};
     const auto entry = appWithIdentifier(app.bundleIdentifier);
-    if (!entry || ::access(document.path().c_str(), F_OK) != 0)
+    if (!entry)
         return false;
     auto uri = document.absoluteString();
     GList uris{uri.data(), nullptr, nullptr};

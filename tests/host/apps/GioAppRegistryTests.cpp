@@ -130,7 +130,6 @@ TEST_F(GioAppRegistryTest, HandsOverTheDocumentItself)
         EXPECT_THAT(answered(), ElementsAre("1", path)) << app;
     }
 
-    EXPECT_FALSE(open("org.example.Editor", Url::fileURL(path + "-promised")));
     EXPECT_FALSE(open("org.example.Nobody", Url::fileURL(path)));
     EXPECT_FALSE(open("org.example.Broken", Url::fileURL(path)));
 }

@@ -12,7 +12,7 @@
 #include <type_traits>
 #include <utility>
 
-namespace tarrow {
+namespace platform {
 
 /// Looks at the disk on another thread for a person who has asked for something, because a disk may be slow,
 /// and goes on with what was found. Only the latest look counts: what a person asks for takes the place of
@@ -33,12 +33,12 @@ public:
     void forget();
 
 private:
-    void start(platform::Work look, std::function<void()> then, std::function<void()> dropped);
+    void start(Work look, std::function<void()> then, std::function<void()> dropped);
     void lookEnded(std::size_t number);
 
-    std::shared_ptr<platform::OperationQueue> _queue;
+    std::shared_ptr<OperationQueue> _queue;
     std::size_t _number = 0;
     std::function<void()> _then, _dropped; ///< of the look that is under way
 };
 
-} // namespace tarrow
+} // namespace platform

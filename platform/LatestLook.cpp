@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "browser/LatestLook.h"
+#include "platform/LatestLook.h"
 
 #include "platform/Services.h"
 #include "platform/Weakly.h"
@@ -9,10 +9,8 @@
 #include <chrono>
 #include <future>
 
-namespace tarrow {
+namespace platform {
 
-using platform::services;
-using platform::weakly;
 
 namespace {
 
@@ -21,13 +19,13 @@ constexpr auto shortWait = std::chrono::milliseconds(16);
 
 } // namespace
 
-void LatestLook::start(platform::Work look, std::function<void()> then, std::function<void()> dropped)
+void LatestLook::start(Work look, std::function<void()> then, std::function<void()> dropped)
 {
     forget();
     _then = std::move(then);
     _dropped = std::move(dropped);
     if (!_queue)
-        _queue = services().dispatch().makeOperationQueue("looks", platform::QualityOfService::UserInitiated);
+        _queue = services().dispatch().makeOperationQueue("looks", QualityOfService::UserInitiated);
     const auto number = _number;
     const auto hasLooked = std::make_shared<std::promise<void>>();
     _queue->addOperation(
@@ -60,4 +58,4 @@ void LatestLook::forget()
         dropped();
 }
 
-} // namespace tarrow
+} // namespace platform
