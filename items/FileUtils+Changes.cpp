@@ -157,7 +157,7 @@ std::optional<Error> FileUtils::moveTo(
     return result;
 }
 
-bool FileUtils::evictDocument(const Url& url)
+std::optional<Error> FileUtils::evict(const Url& url)
 {
     static constexpr Operation op{"+[FileUtils evictDocument:]"};
     std::optional<Error> failed;
@@ -166,7 +166,12 @@ bool FileUtils::evictDocument(const Url& url)
     const auto error = refused ? refused : failed;
     if (error)
         op.warning("Evict error: %@", *error);
-    return !error;
+    return error;
+}
+
+bool FileUtils::evictDocument(const Url& url)
+{
+    return !evict(url);
 }
 
 } // namespace tarrow

@@ -86,7 +86,10 @@ public:
         const Url& url, const std::vector<std::string>& tags, const StillWanted& stillWanted = {});
     static Result<std::vector<std::string>> changeTags(const Url& url, const std::vector<std::string>& added,
         const std::vector<std::string>& removed, const StillWanted& stillWanted = {});
-    /// Removes the downloaded copy of a cloud item. Answers whether no error was reported.
+    /// Removes the downloaded copy of a document and keeps the content in the cloud. See
+    /// platform::FileChanges::evictItem() for the errors.
+    static std::optional<Error> evict(const Url& url);
+    /// Does the same and answers whether no error was reported.
     static bool evictDocument(const Url& url);
 };
 

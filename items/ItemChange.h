@@ -43,11 +43,16 @@ public:
     ItemChange(AccountSession asked, std::vector<Url> items)
         : _asked(std::move(asked))
         , _items(std::move(items))
+        , _count(_items.size())
     {
     }
 
     /// The items that are changed, under the names that they had at the beginning.
     const std::vector<Url>& items() const { return _items; }
+    /// Answers how many items are to be done; that is more than the items where a folder among them stands
+    /// for the documents in it.
+    std::size_t count() const { return _count; }
+    void setCount(std::size_t count) { _count = count; }
     /// Answers how many items the change is done with, failed ones included.
     std::size_t doneCount() const { return _doneCount; }
     void oneDone() { ++_doneCount; }
@@ -77,7 +82,7 @@ private:
 
     const AccountSession _asked;
     const std::vector<Url> _items;
-    std::atomic<std::size_t> _doneCount = 0;
+    std::atomic<std::size_t> _count, _doneCount = 0;
     std::atomic<bool> _isCancelled = false, _hasEnded = false;
 };
 
