@@ -53,6 +53,7 @@ void NavController::initNewListController(const List& list)
     logNewList(list);
     list->setAvailableActions(offeredActions);
     list->setEditTags(weakly(this, &NavController::editTagsOfItems));
+    list->setDownloadVerbs(downloadVerbs());
     configureNavBar(list);
     if (list->title().empty())
         op.warning("Warning: newList title not set");
@@ -137,23 +138,33 @@ void NavController::configureToolbar(const List& list)
 
 void NavController::showRunningChanges(const List& list)
 {
-    if (!_runningChanges)
-        return;
-    list->setChangingItems(_runningChanges->items());
-    showProgressOfChanges(list);
+    if (_runningChanges)
+        list->setChangingItems(_runningChanges->items());
+    showProgress(list);
 }
 
-void NavController::showProgressOfChanges(const List& list)
+void NavController::showProgress(const List& list)
 {
     const auto bar = statusBar(*list);
     if (!bar)
         return;
     const bool hadProgress = !bar->progressItems().empty();
-    const auto change = _runningChanges->longOne();
+    auto shown = progressOfDownloads();
+    if (const auto change = _runningChanges ? _runningChanges->longOne() : nullptr)
+        shown = {RunningChanges::progressText(*change), [change] { change->cancel(); }};
     bar->showProgress(
-        change ? RunningChanges::progressText(*change) : std::string(), [change] { change->cancel(); });
-    if (!list->editing() && hadProgress != (change != nullptr))
+        shown ? shown->text : std::string(), shown ? shown->cancel : [] {});
+    if (!list->editing() && hadProgress != shown.has_value())
         displayStatusBar(*list);
+}
+
+/// Every list on the stack shows it, because the user may go back to any.
+void NavController::showInLists(void (NavController::*show)(const List&))
+{
+    for (const auto& screen : viewControllers()) {
+        if (const auto list = std::dynamic_pointer_cast<DocumentListController>(screen))
+            (this->*show)(list);
+    }
 }
 
 void NavController::updateStatusUI(const List& list)

@@ -211,17 +211,9 @@ void NavController::showNewFolderPromptDuringMoveItemsToMove(
 void NavController::changeBegun(const std::shared_ptr<ItemChange>& change)
 {
     if (!_runningChanges) {
-        const auto inEveryList = [](void (NavController::*show)(const List&)) {
-            return [show](NavController& self) {
-                for (const auto& screen : self.viewControllers()) {
-                    if (const auto list = std::dynamic_pointer_cast<screens::DocumentListController>(screen))
-                        (self.*show)(list);
-                }
-            };
-        };
-        _runningChanges =
-            RunningChanges::create(weakly(this, inEveryList(&NavController::showRunningChanges)),
-                weakly(this, inEveryList(&NavController::showProgressOfChanges)));
+        _runningChanges = RunningChanges::create(
+            weakly(this, &NavController::showInLists, &NavController::showRunningChanges),
+            weakly(this, &NavController::showInLists, &NavController::showProgress));
     }
     _runningChanges->begun(change);
 }

@@ -165,6 +165,7 @@ void NavController::replaceItemManager(int mode)
     dropItemManager();
     _itemManager = PreviewItemManager::newItemManagerWithModeNavController(mode, self());
     _itemManager->setUndoHistory(_undoHistory);
+    _itemManager->setDownloadVerbs(downloadVerbs());
 }
 
 void NavController::showPreviewPreviewMode(const std::shared_ptr<DRItem>& item, int mode)

@@ -5,6 +5,7 @@
 
 #include "browser/ListLogging.h"
 #include "items/DRItem.h"
+#include "items/Downloads.h"
 #include "items/UndoHistory.h"
 #include "kit/views/View.h"
 #include "platform/CloudDocumentService.h"
@@ -62,6 +63,7 @@ void NavController::viewDidLoad()
     static constexpr Operation op{"-[NavController viewDidLoad]"};
     setDelegate(self());
     beginUndoHistory();
+    beginDownloads();
     observeAccount();
     setupInitialViewController();
     NavigationController::viewDidLoad();
@@ -186,6 +188,7 @@ void NavController::handleAccountChanges()
     saveTarrowToken(token);
     RecentDocument::forget();
     _undoHistory->forget();
+    _downloads->forget();
     endEverythingPresented();
     _editMode = false;
     setupInitialViewController();

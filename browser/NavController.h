@@ -29,6 +29,7 @@ class PropertyValue;
 namespace screens {
 class DrivePlaces;
 class UpgradeFlow;
+struct DownloadVerbs;
 } // namespace screens
 namespace kit {
 class BarButtonItem;
@@ -40,10 +41,20 @@ class DRItem;
 class FilenamePrompt;
 class PreviewItemManager;
 class ItemChange;
+class Downloads;
+class DownloadsScreen;
 class RunningChanges;
+struct FoundDocuments;
+struct RemovedDownloads;
 class UndoHistory;
 struct UndoEntry;
 struct UndoOutcome;
+
+/// The progress that stands under a list, and what its Cancel button does.
+struct ShownProgress {
+    std::string text;
+    std::function<void()> cancel;
+};
 
 /// The browser: a stack of the drive's folder lists with a preview on top of them, or the screen that says
 /// that the drive is not available. It follows the cloud account and keeps the line under each list up to
@@ -133,6 +144,9 @@ public:
     const std::shared_ptr<UndoHistory>& undoHistory() const { return _undoHistory; }
     /// Undoes the latest change while a list or an item's details are on top.
     bool undoRequested() override;
+
+    /// What is being downloaded.
+    const std::shared_ptr<Downloads>& downloads() const { return _downloads; }
 
     // In edit mode the user selects several items with check marks.
     using Sender = std::shared_ptr<kit::BarButtonItem>; ///< the button that was pressed; null: none
@@ -284,12 +298,26 @@ private:
     void changeEnded();
     /// Shows in a list what is being changed and how far it has come.
     void showRunningChanges(const List& list);
-    void showProgressOfChanges(const List& list);
+    void showProgress(const List& list);
+    void showInLists(void (NavController::*show)(const List&));
     void makeFolderForItems(
         const platform::Url& folder, const std::vector<platform::Url>& items, const AccountSession& asked);
     void renameConfirmed(const platform::Url& url, const std::string& name, const AccountSession& asked);
     void deleteConfirmed(
         const std::vector<platform::Url>& urls, const Completion& finished, const AccountSession& asked);
+
+    void beginDownloads();
+    screens::DownloadVerbs downloadVerbs();
+    void downloadItems(const std::vector<platform::Url>& items);
+    void downloadFound(const FoundDocuments& found);
+    void removeDownloadsOfItems(const std::vector<platform::Url>& items);
+    void downloadsRemoved(const RemovedDownloads& outcome);
+    void showDownloads();
+    void downloadsChanged();
+    void downloadsEnded(std::size_t arrived, const std::vector<platform::Error>& errors);
+    /// Answers nothing while there is none, or only a short one.
+    std::optional<ShownProgress> progressOfDownloads() const;
+    void showProgressInLists() { showInLists(&NavController::showProgress); }
 
     void beginUndoHistory();
     void offerUndo(std::uint64_t number, const UndoEntry& entry);
@@ -322,6 +350,9 @@ private:
     const std::shared_ptr<platform::LatestLook> _look = std::make_shared<platform::LatestLook>();
     std::shared_ptr<RunningChanges> _runningChanges; ///< null before the first change
     std::shared_ptr<UndoHistory> _undoHistory;
+    std::shared_ptr<Downloads> _downloads;
+    std::weak_ptr<DownloadsScreen> _downloadsScreen; ///< the one that was shown last
+    std::optional<platform::Date> _downloadsSince; ///< when the ones that run began
     std::vector<platform::Observation> _observations;
 };
 

@@ -13,18 +13,17 @@ using platform::weakly;
 
 namespace {
 
-/// Most changes end at once, and a line that flashes would disturb.
-constexpr auto longTime = std::chrono::milliseconds(500);
 constexpr auto period = std::chrono::milliseconds(100);
 constexpr auto leeway = std::chrono::milliseconds(20);
 
-bool isLong(const Date& since)
+} // namespace
+
+/// Most changes end at once, and a line that flashes would disturb.
+bool RunningChanges::isLong(const Date& since)
 {
     return services().dispatch().now().nanoseconds - since.nanoseconds
         >= platform::Duration(longTime).count();
 }
-
-} // namespace
 
 std::shared_ptr<RunningChanges> RunningChanges::create(
     std::function<void()> changed, std::function<void()> progressed)
@@ -77,7 +76,7 @@ std::string RunningChanges::progressText(const ItemChange& change)
 {
     if (change.isCancelled())
         return localized("Cancelling…");
-    const auto count = change.items().size();
+    const auto count = change.count();
     if (count < 2)
         return localized("Changing…");
     return localized(

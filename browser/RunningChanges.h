@@ -5,6 +5,7 @@
 
 #include "items/ItemChange.h"
 
+#include <chrono>
 #include <functional>
 #include <memory>
 #include <string>
@@ -24,6 +25,11 @@ public:
     static std::shared_ptr<RunningChanges> create(
         std::function<void()> changed, std::function<void()> progressed);
     RunningChanges() = default;
+
+    /// A change that takes longer shows its progress.
+    static constexpr auto longTime = std::chrono::milliseconds(500);
+    /// Answers whether that time has passed since a moment.
+    static bool isLong(const platform::Date& since);
 
     void begun(const std::shared_ptr<ItemChange>& change);
     /// Forgets the changes that have ended.

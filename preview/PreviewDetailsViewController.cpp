@@ -147,9 +147,20 @@ void PreviewDetailsViewController::offerMenu()
 
 kit::Menu PreviewDetailsViewController::menu()
 {
-    return {{.title = localized("Tags…"),
+    kit::Menu menu;
+    const auto shown = item();
+    const auto manager = itemManager();
+    if (shown && manager && !shown->isSymlink()) {
+        using Kind = platform::FolderEntryKind;
+        const auto document = shown->isPackage() ? Kind::Package : Kind::Document;
+        const auto kind = shown->isDirectory() ? Kind::Folder : document;
+        screens::addDownloadEntries(
+            menu, manager->downloadVerbs(), {{shown->url(), kind, shown->isPromise(), {}}});
+    }
+    menu.push_back({.title = localized("Tags…"),
         .handler = weakly(this, &PreviewDetailsViewController::editTags),
-        .image = {}}};
+        .image = {}});
+    return menu;
 }
 
 void PreviewDetailsViewController::editTags()

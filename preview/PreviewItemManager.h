@@ -71,6 +71,9 @@ public:
         return _documentInteractionController;
     }
     void setDocumentInteractionController(std::shared_ptr<screens::DocumentInteractionSheet> sheet);
+    /// What the details' menu does with the item's content. Without a function the menu does not offer it.
+    const screens::DownloadVerbs& downloadVerbs() const { return _downloadVerbs; }
+    void setDownloadVerbs(screens::DownloadVerbs verbs) { _downloadVerbs = std::move(verbs); }
     /// The history that gets the item's changes; null: none does.
     std::shared_ptr<UndoHistory> undoHistory() const { return _undoHistory.lock(); }
     void setUndoHistory(std::weak_ptr<UndoHistory> history) { _undoHistory = std::move(history); }
@@ -178,6 +181,7 @@ private:
     std::vector<platform::Observation> _observations;
     std::weak_ptr<UndoHistory> _undoHistory;
     const std::shared_ptr<platform::LatestLook> _look = std::make_shared<platform::LatestLook>();
+    screens::DownloadVerbs _downloadVerbs;
     std::optional<AccountSession> _moveAsked; ///< who was asked last for the destination of a move
     std::optional<platform::Url> _movedTo; ///< where the user of this program has moved the item last
 

@@ -3,16 +3,13 @@
 
 #include "screens/list/DocumentListController.h"
 
-#include "kit/controllers/AlertAction.h"
 #include "kit/controllers/AlertController.h"
 #include "kit/controllers/Window.h"
 #include "kit/views/ListView.h"
-#include "platform/CloudDocumentService.h"
 #include "platform/Localization.h"
 #include "platform/Services.h"
 #include "platform/Weakly.h"
 #include "screens/DisplayName.h"
-#include "screens/ErrorWords.h"
 #include "screens/list/DocumentPeek.h"
 #include "screens/list/DocumentRowSource.h"
 #include "screens/list/DocumentSearch.h"
@@ -71,16 +68,25 @@ std::size_t DocumentListController::selectedItemCount() const
     return _listView ? _listView->selection().count() : 0;
 }
 
-std::vector<Url> DocumentListController::selectedItems() const
+std::vector<RowItem> DocumentListController::selectedRowItems() const
 {
-    std::vector<Url> items;
+    std::vector<RowItem> items;
     if (selectedItemCount() == 0)
         return items;
     const auto& rows = *_contents->rows();
     for (std::size_t row = 0; row < rows.count() && items.size() < selectedItemCount(); ++row) {
+        const auto entry = rows.entry(row);
         if (_listView->selection().contains(rows.ids()[row]))
-            items.push_back(rows.url(row));
+            items.push_back({rows.url(row), entry.kind, entry.isPromise, {}});
     }
+    return items;
+}
+
+std::vector<Url> DocumentListController::selectedItems() const
+{
+    std::vector<Url> items;
+    for (auto& item : selectedRowItems())
+        items.push_back(std::move(item.url));
     return items;
 }
 
@@ -190,8 +196,10 @@ kit::Menu DocumentListController::menuFor(const RowItem& item)
     if (_editing)
         return menu;
     if (item.isPromise)
-        menu.push_back(downloadEntry(item.url));
+        addDownloadEntries(menu, _downloadVerbs, {item});
     for (const auto& entry : menuEntries) {
+        if (entry.action == DocumentListAction::Delete && !item.isPromise)
+            addDownloadEntries(menu, _downloadVerbs, {item});
         if (entry.action == DocumentListAction::Delete && item.kind != FolderEntryKind::Library)
             addTagsEntry(menu, {item.url});
         if (!offers(entry.action, item.kind))
@@ -203,33 +211,6 @@ kit::Menu DocumentListController::menuFor(const RowItem& item)
             .image = {}});
     }
     return menu;
-}
-
-kit::MenuAction DocumentListController::downloadEntry(const Url& url)
-{
-    const bool isRunning = services().cloudDocumentService().items().downloadProgress(url).has_value();
-    if (isRunning)
-        return {.title = localized("Cancel Download"),
-            .handler = [url] { services().cloudDocumentService().items().cancelDownload(url); },
-            .image = {}};
-    return {.title = localized("Download"),
-        .handler = weakly(this, &DocumentListController::download, url),
-        .image = {}};
-}
-
-/// Downloads an item. The download goes on when the user leaves the list; the list reports only a failure.
-void DocumentListController::download(const Url& url)
-{
-    services().cloudDocumentService().items().download(
-        url, weakly(this, [](DocumentListController& self, const std::optional<Error>& error) {
-            if (!error || error->is(FileErrorCode::Cancelled))
-                return;
-            const auto alert = std::make_shared<kit::AlertController>(
-                localized("It could not be downloaded."), errorWords(*error), kit::AlertStyle::Alert);
-            alert->addAction(
-                std::make_shared<kit::AlertAction>(localized("OK"), kit::AlertActionStyle::Default));
-            self.presentViewController(alert, true);
-        }));
 }
 
 void DocumentListController::perform(DocumentListAction action, const Url& url)

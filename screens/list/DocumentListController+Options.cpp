@@ -66,6 +66,7 @@ kit::Menu DocumentListController::optionsMenu()
             .handler = weakly(this, &DocumentListController::selectAllItems)});
         menu.push_back({.title = localized("Select None"),
             .handler = weakly(this, &DocumentListController::deselectAllItems)});
+        addDownloadEntries(menu, _downloadVerbs, selectedRowItems());
         addTagsEntry(menu, selectedItems());
     }
     const auto firstChoice = menu.size();
@@ -85,6 +86,9 @@ kit::Menu DocumentListController::optionsMenu()
         {_order.key, _order.direction, grouped ? FolderGrouping::Mixed : FolderGrouping::FoldersFirst},
         grouped);
     menu.back().beginsSection = true;
+    if (_downloadVerbs.showRunning)
+        menu.push_back(
+            {.title = localized("Downloads"), .handler = _downloadVerbs.showRunning, .beginsSection = true});
     return menu;
 }
 

@@ -12,6 +12,7 @@
 #include "screens/PlatformNames.h"
 #include "screens/list/DocumentListAction.h"
 #include "screens/list/DocumentListControllerDelegate.h"
+#include "screens/list/DownloadVerbs.h"
 #include "screens/list/ListOrder.h"
 
 #include <functional>
@@ -37,7 +38,6 @@ class DocumentSearch;
 class FolderContents;
 class PlaceholderView;
 struct FolderContentsUpdate;
-struct RowItem;
 
 /// The screen that shows one folder of the drive. It begins to list the folder when its view is loaded, and
 /// follows every change from then on. Main thread only; slow work runs on other threads.
@@ -96,6 +96,9 @@ public:
     /// these items. Without a function they do not.
     using EditTags = std::function<void(const std::vector<Url>& items)>;
     void setEditTags(EditTags editTags) { _editTags = std::move(editTags); }
+
+    /// What the menus offer to do with the contents of items; nothing at first.
+    void setDownloadVerbs(DownloadVerbs verbs) { _downloadVerbs = std::move(verbs); }
 
     /// Presents the search field with a query over the list. With `becomeFirstResponder` the field takes the
     /// keyboard focus. The search looks through the names of the whole drive.
@@ -169,8 +172,7 @@ private:
     void perform(DocumentListAction action, const Url& url);
     void actionEnded(std::size_t number);
     void dimBusyRows();
-    kit::MenuAction downloadEntry(const Url& url);
-    void download(const Url& url);
+    std::vector<RowItem> selectedRowItems() const;
     /// Answers the place of an item's row for a popover, or the list itself when the row is not visible.
     std::shared_ptr<kit::View> anchorFor(const Url& url);
     std::optional<RowItem> itemAt(std::size_t index) const;
@@ -208,6 +210,7 @@ private:
     std::size_t _lastAction = 0;
     DocumentListActionSet _availableActions = 0;
     EditTags _editTags;
+    DownloadVerbs _downloadVerbs;
     ListOrder _order;
     bool _editing = false;
     std::optional<ListingStage> _state; ///< the stage of the latest update; absent before the first

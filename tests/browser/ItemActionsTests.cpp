@@ -49,16 +49,6 @@ protected:
         settle();
     }
     bool isThere(std::string_view path) const { return std::filesystem::exists(url(path).path()); }
-    /// Closes the alert on the screen and answers its title; empty without one.
-    std::string takeAlert()
-    {
-        const auto shown = alert();
-        const auto title = shown ? shown->title() : std::string();
-        if (shown)
-            shown->press(0);
-        settle();
-        return title;
-    }
 
     int completions = 0;
 };

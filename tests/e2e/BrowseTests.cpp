@@ -69,6 +69,24 @@ TEST_F(BrowseTests, AnItemGoesToANewFolderThroughThePicker)
     EXPECT_TRUE(eventually([this] { return !program->shows("Undo"); })) << "its message went";
 }
 
+TEST_F(BrowseTests, ADownloadIsRemovedAndComesBack)
+{
+    start();
+    program->press("Desktop");
+    ASSERT_TRUE(eventually([this] { return program->shows("To do.txt"); }));
+    const auto document = top / "Desktop/To do.txt";
+    const auto size = std::filesystem::file_size(document);
+    EXPECT_TRUE(program->buttons("To do.txt").back().perform("row.menu"));
+    program->press("Remove Download");
+    EXPECT_TRUE(eventually([this] { return program->says("1 download was removed"); }));
+    EXPECT_TRUE(program->shows("To do.txt"));
+    EXPECT_FALSE(std::filesystem::exists(document));
+    EXPECT_TRUE(program->buttons("To do.txt").back().perform("row.menu"));
+    program->press("Download");
+    EXPECT_TRUE(eventually([&] { return std::filesystem::exists(document); }));
+    EXPECT_EQ(std::filesystem::file_size(document), size);
+}
+
 TEST_F(BrowseTests, AWindowSaysWhatNeedsNoAnswer)
 {
     start();

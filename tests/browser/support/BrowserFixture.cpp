@@ -104,6 +104,16 @@ std::shared_ptr<kit::AlertController> BrowserFixture::alert() const
     return std::dynamic_pointer_cast<kit::AlertController>(browser->presentedViewController());
 }
 
+std::string BrowserFixture::takeAlert()
+{
+    const auto shown = alert();
+    const auto title = shown ? shown->title() : std::string();
+    if (shown)
+        shown->press(0);
+    settle();
+    return title;
+}
+
 void BrowserFixture::watch(kit::Window& shown)
 {
     notices = std::make_shared<ShownNotices>();

@@ -82,6 +82,8 @@ protected:
     /// and "-" for another screen.
     std::vector<std::string> stack() const;
     std::shared_ptr<kit::AlertController> alert() const;
+    /// Closes the alert on the screen and answers its title; empty without one.
+    std::string takeAlert();
     /// Keeps what a window tells the user from now on.
     void watch(kit::Window& shown);
     /// Answers what the window told the user since the last call.

@@ -287,6 +287,10 @@ TEST_F(DocumentList, DownloadsADocumentAndShowsHowFarItIs)
     std::ofstream(drive.layout().cloud() + "/far") << std::string(4'000'000, 'x');
     drive.writePromise("Stuff/far.txt", far);
     const auto list = shownList(drive.url("Stuff"));
+    auto& items = platform::services().cloudDocumentService().items();
+    list->setDownloadVerbs({.download = [&](const auto& wanted) { items.download(wanted.front(), {}); },
+        .remove = {},
+        .showRunning = {}});
     deliver(list, {{"far.txt", Kind::Document, true}, {"here.txt"}});
     const auto row = [&] { return list->listView()->row(0); };
     const auto choose = [&](const std::string& title) {
@@ -314,13 +318,6 @@ TEST_F(DocumentList, DownloadsADocumentAndShowsHowFarItIs)
     drive.dispatch->runUntilIdle();
     EXPECT_THAT(observer->shares, Contains(AllOf(Gt(0.2), Lt(0.9))));
     EXPECT_TRUE(std::filesystem::exists(drive.url("Stuff/far.txt").path()));
-
-    std::filesystem::remove(drive.url("Stuff/far.txt").path());
-    far.content = "lost";
-    drive.writePromise("Stuff/far.txt", far);
-    choose("Download");
-    drive.dispatch->runUntilIdle();
-    EXPECT_TRUE(alertOver(*list));
 }
 
 } // namespace
