@@ -137,6 +137,16 @@ Nanoseconds fileTime()
     return system::nanosecondsOf(now);
 }
 
+/// Syncs the drive's file system, whose errors are told, and those that are mounted in its folders.
+SystemError syncAll(const DriveLayout& layout)
+{
+    const FileDescriptor home(::open(layout.home().c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    if (!home || ::syncfs(home.get()) != 0)
+        return SystemError::last(layout.home());
+    ::sync();
+    return {};
+}
+
 /// Remembers in a file how long the last walk took, and lets the next one wait accordingly.
 class Pace {
 public:
@@ -206,6 +216,8 @@ SystemResult<Outcome> ContentCollection::collect(const Names& released)
     const auto from = openOwnFolder(_layout.released()), to = openOwnFolder(_layout.cloud());
     if (!from || !to)
         return from ? to.error : from.error;
+    // What the contents stand for now must be on the disk before they go: the documents that were downloaded.
+    TRW_TRY(syncAll(_layout));
     for (const auto& content : released) {
         if (first->names(content))
             static_cast<void>(renameEntry(*from, content, *to, content));

@@ -102,6 +102,8 @@ SystemError Arrival::takeOver()
     _promise.record = std::move(*now);
     _traits = *traits;
     traits->attributes[itemMark::status] = "current";
+    if (const auto identifier = _promise.record.documentIdentifier)
+        traits->attributes[itemMark::documentIdentifier] = std::to_string(identifier);
     if (_promise.record.created)
         traits->attributes[itemMark::created] = std::to_string(_promise.record.created->nanoseconds);
     // The record comes first, because the attributes count before it and the access may forbid more writing.
@@ -141,7 +143,9 @@ SystemError Arrival::takePlace()
     if (::fstat(_file->descriptor().get(), &whole) != 0)
         return SystemError::last(_entry.name);
     _published = versionOf(whole);
-    TRW_TRY(_file->publish(_entry, _entry.name));
+    // The promise and its content outlive a power cut that takes the new name, because both go later in the
+    // same journal, and the content after a sync of everything.
+    TRW_TRY(_file->publish(_entry, _entry.name, NewFile::Sync::Content));
     return removePromise();
 }
 
@@ -154,7 +158,7 @@ SystemError Arrival::removePromise()
         return withdraw();
     if (held.error.is(ESTALE))
         return {};
-    if (!held || adoptChanges() || held->remove(&_store))
+    if (!held || adoptChanges() || held->removePromise(_store))
         _file->keepRecord();
     return {};
 }
@@ -162,7 +166,13 @@ SystemError Arrival::removePromise()
 SystemError Arrival::adoptChanges()
 {
     const auto now = ItemTraits::read(_promise.file);
-    return now ? now->writeChanges(_traits, _file->descriptor()) : now.error;
+    if (!now)
+        return now.error;
+    TRW_TRY(now->writeChanges(_traits, _file->descriptor()));
+    const auto record = readPromise(_promise.file);
+    if (!record || record->documentIdentifier == _promise.record.documentIdentifier)
+        return record.error;
+    return writeIdentifier(_file->descriptor(), record->documentIdentifier);
 }
 
 /// Removes the new document, because another program took its promise away in the moment before: it must not

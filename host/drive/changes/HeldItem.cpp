@@ -112,6 +112,15 @@ SystemError HeldItem::remove(CloudStore* store)
     return {};
 }
 
+SystemError HeldItem::removePromise(CloudStore& store)
+{
+    auto discarded = discardTree(folder(), _name, &store);
+    if (discarded.failure)
+        putBack();
+    _isThere = false;
+    return discarded.failure;
+}
+
 void HeldItem::putBack()
 {
     static constexpr platform::Operation op{"-[HeldItem putBack]"};

@@ -40,6 +40,11 @@ public:
     /// was are removed at the next start; the item counts as removed then.
     system::SystemError remove(CloudStore* store);
 
+    /// Removes a promise whose document is here, and releases the content. Nothing is synced, because a
+    /// promise that came back after a power cut would be settled with its document. After a failure it was
+    /// put back.
+    system::SystemError removePromise(CloudStore& store);
+
 private:
     HeldItem() = default;
     system::SystemError decide(const char* prefix);

@@ -128,6 +128,14 @@ SystemError ItemTraits::write(const FileDescriptor& item) const
     return SystemError::unless(::fchmod(item.get(), rights) == 0);
 }
 
+ItemTraits ItemTraits::ofPromise() const
+{
+    auto traits = *this;
+    for (const char* name : {itemMark::documentIdentifier, itemMark::created, itemMark::status})
+        traits.attributes.erase(name);
+    return traits;
+}
+
 SystemError ItemTraits::writeChanges(const ItemTraits& before, const FileDescriptor& item) const
 {
     for (const auto& [name, value] : attributes) {

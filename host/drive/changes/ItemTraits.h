@@ -31,6 +31,8 @@ struct ItemTraits {
     /// nothing with it, because these rights were meant for others. A file system without attributes gets
     /// none.
     system::SystemError write(const system::FileDescriptor& item) const;
+    /// Answers the traits without the attributes that a promise's record says instead.
+    ItemTraits ofPromise() const;
     /// Gives an open item what has changed since `before`, and leaves the rest of it alone.
     system::SystemError writeChanges(const ItemTraits& before, const system::FileDescriptor& item) const;
 };

@@ -89,9 +89,8 @@ SystemError LocalCloudStore::store(
     if (!folder)
         return folder.error;
     TRW_TRY(renameEntry(document.folder, document.name, *folder, content));
+    // A power cut that takes this rename leaves the document in its place, where it hides its promise.
     auto failure = checkStored(*folder, content, version);
-    if (!failure)
-        failure = syncFolder(*folder);
     // When the file cannot be given its old name back, it stays in the store as a content.
     if (failure)
         static_cast<void>(renameEntry(*folder, content, document.folder, document.name));

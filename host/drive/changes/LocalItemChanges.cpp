@@ -301,9 +301,9 @@ SystemError LocalItemChanges::replaceByPromise(const LocatedItem& item)
     if (!file)
         return file.error;
     TRW_TRY(writePromise(file->descriptor(), promiseFor(document, content)));
-    TRW_TRY(traits->write(file->descriptor()));
+    TRW_TRY(traits->ofPromise().write(file->descriptor()));
     // While both exist the document counts. It is removed only when its promise is safe on the disk.
-    TRW_TRY(file->publish(entry, entry.promiseName()));
+    TRW_TRY(file->publish(entry, entry.promiseName(), NewFile::Sync::Name));
     auto failure = _store->store(entry, versionOf(item.found), content);
     if (failure) {
         // A promise that cannot be taken back is taken back by the next start.

@@ -54,12 +54,17 @@ SystemError NewFile::write(std::string_view text) const
     return system::writeWhole(_file, text);
 }
 
-SystemError NewFile::publish(const DriveEntry& entry, const std::string& name)
+SystemError NewFile::publish(const DriveEntry& entry, const std::string& name, Sync sync)
 {
-    if (::fsync(_file.get()) != 0)
+    if (sync != Sync::Name && ::fsync(_file.get()) != 0)
         return SystemError::last(_name);
     TRW_TRY(renameEntry(_folder, _name, entry.folder, name));
-    auto failure = syncFolder(entry.folder);
+    SystemError failure;
+    // After the rename both are in one transaction of the journal, so the second call finds nothing to do.
+    if (sync == Sync::Name)
+        failure = SystemError::unless(::fsync(_file.get()) == 0, _name);
+    if (!failure && sync != Sync::Content)
+        failure = syncFolder(entry.folder);
     // The file is renamed back to its private name and is removed with it.
     if (!failure || renameEntry(entry.folder, name, _folder, _name))
         _name.clear();

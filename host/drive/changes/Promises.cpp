@@ -77,7 +77,7 @@ SystemError settleTwin(const DriveLayout& layout, const DriveEntry& entry, Cloud
     auto promise = takePromise(layout, entry, *content);
     if (!promise)
         return promise.error.is(ENOENT) || promise.error.is(ESTALE) ? SystemError() : promise.error;
-    return promise->remove(&store);
+    return promise->removePromise(store);
 }
 
 SystemError withdrawPromise(

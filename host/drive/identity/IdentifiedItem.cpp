@@ -61,10 +61,7 @@ bool IdentifiedItem::canCarryIdentifier() const
 
 SystemError IdentifiedItem::carry(std::uint32_t identifier) const
 {
-    const auto text = std::to_string(identifier);
-    const auto path = descriptorPath(_file);
-    if (::setxattr(path.c_str(), itemMark::documentIdentifier, text.data(), text.size(), 0) != 0)
-        return SystemError::last(_path);
+    TRW_TRY(writeIdentifier(_file, identifier));
     // The file may have been replaced by another one, such as a new version or the downloaded document.
     struct stat now;
     if (::fstat(_file.get(), &now) != 0)

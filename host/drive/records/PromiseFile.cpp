@@ -3,6 +3,7 @@
 
 #include "host/drive/records/PromiseFile.h"
 
+#include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/ItemMarks.h"
 #include "host/drive/records/SmallFile.h"
 #include "host/system/files/AtomicWrite.h"
@@ -95,13 +96,23 @@ SystemError writePromise(const FileDescriptor& file, const PromiseRecord& promis
     return system::writeWhole(file, promise.toJson());
 }
 
+SystemError writeIdentifier(const FileDescriptor& file, std::uint32_t identifier)
+{
+    const auto path = descriptorPath(file);
+    const auto form = AttributeReader(file).value(itemMark::promise);
+    auto promise = form ? PromiseRecord::parseShortForm(*form) : std::nullopt;
+    const char* name = promise ? itemMark::promise : itemMark::documentIdentifier;
+    if (promise)
+        promise->documentIdentifier = identifier;
+    const auto value = promise ? promise->shortForm() : std::to_string(identifier);
+    return SystemError::unless(::setxattr(path.c_str(), name, value.data(), value.size(), 0) == 0);
+}
+
 SystemError writeMarks(const FileDescriptor& file, const PromiseRecord& promise)
 {
-    const auto identifier = promise.documentIdentifier;
     const std::pair<const char*, std::string> marks[] = {{itemMark::tags, joinedTags(promise.tags)},
         {itemMark::shared, promise.shared ? "1" : ""},
         {itemMark::role, promise.role ? nameOf(*promise.role) : ""},
-        {itemMark::documentIdentifier, identifier != 0 ? std::to_string(identifier) : ""},
         {system::hiddenExtensionAttribute, promise.extensionHidden ? "1" : ""},
         {itemMark::type, promise.type}};
     for (const auto& [name, value] : marks) {

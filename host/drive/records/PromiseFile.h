@@ -25,6 +25,8 @@ system::SystemResult<PromiseRecord> readPromise(const system::FileDescriptor& fi
 /// Writes a promise into an empty file that is open for writing: attributes where the file system has any,
 /// else the JSON.
 system::SystemError writePromise(const system::FileDescriptor& file, const PromiseRecord& promise);
+/// Writes another identifier into a promise that is open.
+system::SystemError writeIdentifier(const system::FileDescriptor& file, std::uint32_t identifier);
 /// Writes what the promise says beside its short form, as attributes of a file: the promise's own or the
 /// document's that takes its place.
 system::SystemError writeMarks(const system::FileDescriptor& file, const PromiseRecord& promise);

@@ -30,18 +30,18 @@ PromiseRecord::Kind kindNamed(std::string_view name)
 
 constexpr char shortVersion = 2;
 constexpr int hasSize = 1, hasCreated = 2, hasModified = 4; // flags
-constexpr std::size_t shortFormHead = 3 + 3 * 8; // bytes before the content's name
+constexpr std::size_t shortFormHead = 3 + 3 * 8 + 4; // bytes before the content's name
 
-void appendNumber(std::string& form, std::uint64_t number)
+void appendNumber(std::string& form, std::uint64_t number, int bytes = 8)
 {
-    for (int byte = 0; byte < 8; ++byte)
+    for (int byte = 0; byte < bytes; ++byte)
         form += static_cast<char>(number >> (8 * byte));
 }
 
-std::uint64_t numberAt(std::string_view form, std::size_t position)
+std::uint64_t numberAt(std::string_view form, std::size_t position, std::size_t bytes = 8)
 {
     std::uint64_t number = 0;
-    for (std::size_t byte = 0; byte < 8; ++byte)
+    for (std::size_t byte = 0; byte < bytes; ++byte)
         number |= std::uint64_t{static_cast<unsigned char>(form[position + byte])} << (8 * byte);
     return number;
 }
@@ -177,6 +177,7 @@ std::string PromiseRecord::shortForm() const
     appendNumber(form, size.value_or(0));
     appendNumber(form, static_cast<std::uint64_t>(created.value_or(Date{}).nanoseconds));
     appendNumber(form, static_cast<std::uint64_t>(modified.value_or(Date{}).nanoseconds));
+    appendNumber(form, documentIdentifier, 4);
     return form + content;
 }
 
@@ -195,6 +196,7 @@ std::optional<PromiseRecord> PromiseRecord::parseShortForm(std::string_view form
         promise.created = Date{static_cast<std::int64_t>(number(1))};
     if (flags & hasModified)
         promise.modified = Date{static_cast<std::int64_t>(number(2))};
+    promise.documentIdentifier = static_cast<std::uint32_t>(numberAt(form, 3 + 3 * 8, 4));
     promise.content = form.substr(shortFormHead);
     const bool isName = promise.content.find('\0') == std::string::npos;
     return isName ? std::optional(std::move(promise)) : std::nullopt;

@@ -40,10 +40,11 @@ struct PromiseRecord {
     /// Parses a promise's text. Answers nothing when it is not a single, whole JSON object.
     static std::optional<PromiseRecord> parse(std::string_view text);
     std::string toJson() const;
-    /// Parses and writes the short form, which has at most 60 bytes when the content's name has at most 33:
-    /// the byte 2, the kind (0 file, 1 directory, 2 package), a byte of flags (1: the size is known, 2: the
-    /// day of the making, 4: the day of the last change), these three numbers in 8 bytes each, the least byte
-    /// first, and the content's name. The other members are not in it.
+    /// Parses and writes the short form, which has at most 60 bytes when the content's name has at most 29:
+    /// an inode of ext4 has room for 64. It is the byte 2, the kind (0 file, 1 directory, 2 package), a byte
+    /// of flags (1: the size is known, 2: the day of the making, 4: the day of the last change), these three
+    /// numbers in 8 bytes each and the identifier in 4, the least byte first, and the content's name. The
+    /// other members are not in it.
     static std::optional<PromiseRecord> parseShortForm(std::string_view form);
     std::string shortForm() const;
 
