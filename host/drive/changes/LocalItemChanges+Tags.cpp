@@ -5,6 +5,7 @@
 
 #include "host/drive/changes/LocalItemChanges.h"
 #include "host/drive/changes/Promises.h"
+#include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/ItemMarks.h"
 #include "host/drive/records/SmallFile.h"
 
@@ -86,6 +87,11 @@ SystemResult<Tags> editItem(const LocatedItem& located, const platform::FileChan
     if (*tags == item->tags)
         return std::move(item->tags);
     TRW_TRY(writeTags(item->file, *tags, item->without));
+    // Tags are done when they outlive a power cut. An item that cannot be opened has them all the same.
+    const FileDescriptor open(
+        ::open(descriptorPath(item->file).c_str(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
+    if (open)
+        ::fsync(open.get());
     TRW_TRY(checkIsStillThere(item->file));
     return std::move(item->tags);
 }
