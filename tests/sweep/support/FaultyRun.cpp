@@ -28,6 +28,8 @@ namespace sweep_tests {
 
 namespace {
 
+using host::system::FileDescriptor;
+
 constexpr int namedInFolder[] = {SYS_openat, SYS_openat2, SYS_newfstatat, SYS_statx, SYS_readlinkat,
     SYS_faccessat2, SYS_renameat, SYS_renameat2, SYS_unlinkat, SYS_mkdirat, SYS_symlinkat, SYS_linkat,
     SYS_utimensat};
@@ -37,7 +39,14 @@ constexpr int namedByPath[] = {SYS_lsetxattr,
 #endif
 };
 constexpr int ofOpenFile[] = {SYS_fsetxattr, SYS_flistxattr, SYS_fgetxattr, SYS_fchmod, SYS_ftruncate,
-    SYS_fstat, SYS_read, SYS_write, SYS_fsync, SYS_fdatasync, SYS_lseek, SYS_getdents64};
+    SYS_fstat, SYS_read, SYS_pread64, SYS_write, SYS_fsync, SYS_fdatasync, SYS_lseek, SYS_getdents64};
+constexpr int changingNames[] = {SYS_renameat, SYS_renameat2, SYS_unlinkat,
+#ifdef __x86_64__
+    SYS_rename, SYS_unlink, SYS_rmdir
+#endif
+};
+constexpr int transferring[] = {SYS_read, SYS_pread64, SYS_write};
+constexpr int opening[] = {SYS_openat, SYS_openat2};
 constexpr std::span<const int> watched[] = {namedInFolder, namedByPath, ofOpenFile};
 constexpr int needingSpace[] = {SYS_renameat, SYS_renameat2, SYS_mkdirat, SYS_symlinkat, SYS_linkat,
     SYS_lsetxattr, SYS_fsetxattr, SYS_ftruncate, SYS_write, SYS_fsync, SYS_fdatasync,
@@ -118,15 +127,42 @@ FileCall describe(const seccomp_notif& notice)
         call.subject = pathIn(process, arguments[0], textAt(process, arguments[1]));
     if (call.number == SYS_renameat2)
         call.newName = pathIn(process, arguments[2], textAt(process, arguments[3]));
+    if (call.isTransfer())
+        call.length = arguments[2];
     return call;
 }
 
-void answer(int listener, const seccomp_notif& notice, int errorNumber)
+/// Makes a process's read or write in its place, with the same open file, for one byte. Answers the count, or
+/// a negative error number.
+int transferOneByte(pid_t process, const seccomp_data& call)
+{
+    const FileDescriptor place(static_cast<int>(::syscall(SYS_pidfd_open, process, 0)));
+    const FileDescriptor file(
+        static_cast<int>(::syscall(SYS_pidfd_getfd, place.get(), static_cast<int>(call.args[0]), 0)));
+    char byte = 0;
+    const iovec here{&byte, 1}, there{reinterpret_cast<void*>(call.args[1]), 1};
+    ssize_t count = -1;
+    if (call.nr == SYS_write)
+        count = ::process_vm_readv(process, &here, 1, &there, 1, 0) == 1 ? ::write(file.get(), &byte, 1) : -1;
+    else if (call.nr == SYS_read)
+        count = ::read(file.get(), &byte, 1);
+    else
+        count = ::pread(file.get(), &byte, 1, static_cast<off_t>(call.args[3]));
+    if (count == 1 && call.nr != SYS_write)
+        count = ::process_vm_writev(process, &here, 1, &there, 1, 0);
+    return count < 0 ? -errno : static_cast<int>(count);
+}
+
+void answer(int listener, pid_t process, const seccomp_notif& notice, const Fault& fault)
 {
     seccomp_notif_resp response{};
     response.id = notice.id;
-    response.error = -errorNumber;
-    response.flags = errorNumber == 0 ? SECCOMP_USER_NOTIF_FLAG_CONTINUE : 0;
+    const int count = fault.isShort ? transferOneByte(process, notice.data) : -fault.errorNumber;
+    if (count < 0)
+        response.error = count;
+    else
+        response.val = count;
+    response.flags = fault.isNone() ? SECCOMP_USER_NOTIF_FLAG_CONTINUE : 0;
     ::ioctl(listener, SECCOMP_IOCTL_NOTIF_SEND, &response);
 }
 
@@ -148,7 +184,7 @@ Ending supervise(pid_t process, int listener, const std::string& folder, const F
         if (fault.isKill)
             ::kill(process, SIGKILL);
         else
-            answer(listener, notice, fault.errorNumber);
+            answer(listener, process, notice, fault);
     }
     int status = 0;
     ::waitpid(process, &status, 0);
@@ -182,16 +218,31 @@ bool FileCall::mayNeedSpace() const
     return isAmong(needingSpace, number);
 }
 
+bool FileCall::changesNames() const
+{
+    return isAmong(changingNames, number);
+}
+
 bool FileCall::takesPath() const
 {
     return !isAmong(ofOpenFile, number);
 }
 
+bool FileCall::opensFile() const
+{
+    return isAmong(opening, number);
+}
+
+bool FileCall::isTransfer() const
+{
+    return isAmong(transferring, number);
+}
+
 Ending runWithFaults(
     const std::vector<std::string>& command, const std::string& watchedFolder, const FaultFor& faultFor)
 {
-    const host::system::FileDescriptor quiet(::open("/dev/null", O_WRONLY | O_CLOEXEC));
-    const host::system::FileDescriptor listener(::open("/dev/null", O_WRONLY | O_CLOEXEC));
+    const FileDescriptor quiet(::open("/dev/null", O_WRONLY | O_CLOEXEC));
+    const FileDescriptor listener(::open("/dev/null", O_WRONLY | O_CLOEXEC));
     // This process goes on when the child has become the program, and not before.
     const auto process =
         static_cast<pid_t>(::syscall(SYS_clone, CLONE_FILES | CLONE_VFORK | SIGCHLD, 0, 0, 0, 0));

@@ -16,14 +16,20 @@ struct FileCall {
     std::string subject; ///< the path or the open file of the call, as far as it is known
     std::string newName; ///< of a rename
     int index = 0; ///< counted from 1 among the calls below the watched folder
+    std::uint64_t length = 0; ///< the bytes that a read or a write is for
     bool mayNeedSpace() const; ///< it writes or makes a name
+    bool changesNames() const; ///< it renames or removes
     bool takesPath() const;
+    bool opensFile() const;
+    bool isTransfer() const; ///< it reads or writes a file's content
 };
 
 /// The fault that a call meets, none by default.
 struct Fault {
     int errorNumber = 0;
     bool isKill = false;
+    bool isShort = false; ///< a read or a write transfers one byte only, and says so
+    bool isNone() const { return errorNumber == 0 && !isKill && !isShort; }
 };
 using FaultFor = std::function<Fault(const FileCall&)>;
 

@@ -85,8 +85,7 @@ Ending SweepFixture::run(const FaultFor& faultFor) const
     command.insert(command.end(), GetParam().arguments.begin(), GetParam().arguments.end());
     return runWithFaults(command, _layout.home() + '/', [&](const FileCall& call) {
         const auto fault = faultFor(call);
-        const bool isFaultless = fault.errorNumber == 0 && !fault.isKill;
-        return isFaultless && isForOtherFileSystem(call) ? Fault{EXDEV} : fault;
+        return fault.isNone() && isForOtherFileSystem(call) ? Fault{EXDEV} : fault;
     });
 }
 
@@ -243,6 +242,21 @@ bool SweepFixture::isNothingHalf(const Drive& now, const Drive& before)
         return item.second == "folder" || item.second == "nothing" || item.second == tagged
             || std::ranges::any_of(before, [&](const auto& old) { return old.second == item.second; });
     });
+}
+
+bool SweepFixture::isBeforeOrAfter(const Drive& now, const Drive& before, const Drive& after) const
+{
+    const bool isOnTheWay = GetParam().arguments[0] == "mkdir" && std::ranges::includes(now, before)
+        && std::ranges::includes(after, now);
+    return now == before || now == after || isOnTheWay;
+}
+
+bool SweepFixture::isBeforeAfterOrBoth(const Drive& now, const Drive& before, const Drive& after) const
+{
+    auto both = before;
+    both.insert(after.begin(), after.end());
+    return isBeforeOrAfter(now, before, after)
+        || (GetParam().fileSystems == FileSystems::Several && now == both);
 }
 
 std::string SweepFixture::differences(const Drive& now, const Drive& before)

@@ -63,6 +63,12 @@ protected:
     bool isAllThere(const Drive& drive) const;
     /// Answers whether no name shows a content that was not under some name before.
     static bool isNothingHalf(const Drive& now, const Drive& before);
+    /// Answers whether an operation that was ended on the way, and what the next start makes of it, may leave
+    /// this drive: the one before or the one after, or some of the folders that were being made.
+    bool isBeforeOrAfter(const Drive& now, const Drive& before, const Drive& after) const;
+    /// Answers the same, but where documents are copied to another file system a second misfortune may leave
+    /// both.
+    bool isBeforeAfterOrBoth(const Drive& now, const Drive& before, const Drive& after) const;
     static std::string differences(const Drive& now, const Drive& before);
     static std::string read(const std::string& path);
     static void write(const std::string& path, const std::string& content);
