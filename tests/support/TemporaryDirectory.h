@@ -15,9 +15,10 @@ namespace testing_support {
 /// A folder for one test, which is removed with everything in it at the end.
 class TemporaryDirectory {
 public:
-    TemporaryDirectory()
+    explicit TemporaryDirectory(
+        const std::filesystem::path& above = std::filesystem::temp_directory_path())
     {
-        auto pattern = (std::filesystem::temp_directory_path() / "tarrow-test-XXXXXX").string();
+        auto pattern = (above / "tarrow-test-XXXXXX").string();
         if (!mkdtemp(pattern.data()))
             throw std::runtime_error("cannot make a temporary folder");
         // The path is canonical, so that it compares equal to the file system's answers.
