@@ -1,6 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
+#include "host/drive/changes/LocalCloudStore.h"
+#include "host/drive/changes/Recovery.h"
 #include "tests/sweep/support/DiskImage.h"
 #include "tests/sweep/support/SweepFixture.h"
 
@@ -27,6 +29,13 @@ enum class Others { AreQuiet, SyncTheirFiles };
 /// starts again on each copy, as after a power cut at that moment.
 class PowerCut : public sweep_tests::SweepFixture {
 protected:
+    /// Settles what has a private name without a record: nothing keeps the order of two disks.
+    void settleStrays() const
+    {
+        host::drive::LocalCloudStore store(_layout);
+        EXPECT_FALSE(
+            host::drive::Recovery(_layout, store, std::chrono::nanoseconds(0)).settleStraysAmongItems());
+    }
     void TearDown() override { unmount(); }
     static bool isLong() { return ::getenv("TARROW_LONG_SWEEP") != nullptr; }
 
@@ -132,8 +141,11 @@ TEST_P(PowerCut, LosesNothingAtAnyMoment)
             EXPECT_TRUE(isNothingHalf(seen(), before)) << differences(seen(), before);
             EXPECT_TRUE(isAllThere(isRemoval() ? after : before));
             startAgain();
+            settleStrays();
             const auto now = noticed();
-            EXPECT_TRUE(moment == moments.back() ? now == after : isBeforeAfterOrBoth(now, before, after))
+            // A download may have to be made again: its content is in the cloud until a sync of everything.
+            const bool isCertain = moment == moments.back() && GetParam().arguments[0] != "fetch";
+            EXPECT_TRUE(isCertain ? now == after : isBeforeAfterOrBoth(now, before, after))
                 << differences(now, before);
             EXPECT_THAT(leftovers(), testing::IsEmpty());
             unmount();

@@ -302,8 +302,9 @@ SystemError LocalItemChanges::replaceByPromise(const LocatedItem& item)
         return file.error;
     TRW_TRY(writePromise(file->descriptor(), promiseFor(document, content)));
     TRW_TRY(traits->ofPromise().write(file->descriptor()));
-    // While both exist the document counts. It is removed only when its promise is safe on the disk.
-    TRW_TRY(file->publish(entry, entry.promiseName(), NewFile::Sync::Name));
+    // While both exist the document counts. Both names change in one journal, in this order, so one sync at
+    // the end is enough.
+    TRW_TRY(file->publish(entry, entry.promiseName(), NewFile::Sync::Nothing));
     auto failure = _store->store(entry, versionOf(item.found), content);
     if (failure) {
         // A promise that cannot be taken back is taken back by the next start.
@@ -311,12 +312,13 @@ SystemError LocalItemChanges::replaceByPromise(const LocatedItem& item)
             file->keepRecord();
         return failure;
     }
-    // The document's name needs no sync. If it came back after a power cut, it would only hide its promise.
     const auto now = ItemTraits::read(document);
     const auto missed = now ? now->writeChanges(*traits, file->descriptor()) : now.error;
     if (missed)
         op.warning("Cannot give the promise of %@ what has changed meanwhile: %@", entry.path, missed);
-    return {};
+    // The document is in the cloud by now, whether or not its folder can be opened for a sync of its own.
+    static_cast<void>(syncFolder(entry.folder));
+    return SystemError::unless(::fsync(file->descriptor().get()) == 0, entry.name);
 }
 
 } // namespace host::drive

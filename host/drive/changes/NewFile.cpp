@@ -56,15 +56,10 @@ SystemError NewFile::write(std::string_view text) const
 
 SystemError NewFile::publish(const DriveEntry& entry, const std::string& name, Sync sync)
 {
-    if (sync != Sync::Name && ::fsync(_file.get()) != 0)
+    if (sync != Sync::Nothing && ::fsync(_file.get()) != 0)
         return SystemError::last(_name);
     TRW_TRY(renameEntry(_folder, _name, entry.folder, name));
-    SystemError failure;
-    // After the rename both are in one transaction of the journal, so the second call finds nothing to do.
-    if (sync == Sync::Name)
-        failure = SystemError::unless(::fsync(_file.get()) == 0, _name);
-    if (!failure && sync != Sync::Content)
-        failure = syncFolder(entry.folder);
+    auto failure = sync == Sync::ContentAndName ? syncFolder(entry.folder) : SystemError();
     // The file is renamed back to its private name and is removed with it.
     if (!failure || renameEntry(entry.folder, name, _folder, _name))
         _name.clear();

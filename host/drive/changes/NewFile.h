@@ -36,13 +36,13 @@ public:
     const system::FileDescriptor& descriptor() const { return _file; }
     /// Writes a text.
     system::SystemError write(std::string_view text) const;
-    /// Says what is on the disk when publish() answers. The name alone is enough for a file without content,
-    /// whose attributes are in the same journal; the content alone where the old name stays until the new one
-    /// is there, too.
-    enum class Sync : std::uint8_t { Content, Name, Both };
+    /// Says what is on the disk when publish() answers. The content alone is enough where what stood for it
+    /// stays until the name is there, too; nothing for a file without content that its caller syncs.
+    enum class Sync : std::uint8_t { Nothing, Content, ContentAndName };
     /// Gives the file its name. It never replaces a file (EEXIST). The record for the next start stays until
     /// the end.
-    system::SystemError publish(const DriveEntry& entry, const std::string& name, Sync sync = Sync::Both);
+    system::SystemError publish(
+        const DriveEntry& entry, const std::string& name, Sync sync = Sync::ContentAndName);
     /// Syncs the file and gives it the name of the `expected` version, which is removed for good. What became
     /// of that version's traits since it had `traits` is done to this file, too. Answers the new version, or
     /// ECANCELED when another version had taken the name, which it has then again. A version that nobody
