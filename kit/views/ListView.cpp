@@ -224,8 +224,9 @@ Menu ListView::menuForList()
 bool ListView::commandRow(std::size_t index, RowCommand command)
 {
     const auto delegate = _listDelegate.lock();
-    return delegate && isItem(index) && _selectionMode == SelectionMode::None
-        && delegate->rowCommand(*this, index, command);
+    // In selection mode only this key has a meaning: for the selected items.
+    const bool hasMeaning = _selectionMode == SelectionMode::None || command == RowCommand::Delete;
+    return delegate && isItem(index) && hasMeaning && delegate->rowCommand(*this, index, command);
 }
 
 bool ListView::holdRow(std::size_t index)

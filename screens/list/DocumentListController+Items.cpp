@@ -200,8 +200,10 @@ kit::Menu DocumentListController::menuFor(const RowItem& item)
     for (const auto& entry : menuEntries) {
         if (entry.action == DocumentListAction::Delete && !item.isPromise)
             addDownloadEntries(menu, _downloadVerbs, {item});
-        if (entry.action == DocumentListAction::Delete && item.kind != FolderEntryKind::Library)
+        if (entry.action == DocumentListAction::Delete && item.kind != FolderEntryKind::Library) {
             addTagsEntry(menu, {item.url});
+            addTrashEntry(menu, {item.url});
+        }
         if (!offers(entry.action, item.kind))
             continue;
         auto chosen = weakly(this, &DocumentListController::perform, entry.action, item.url);
@@ -277,13 +279,31 @@ bool DocumentListController::rowCommand(kit::ListView&, std::size_t index, kit::
     return item && obey(command, *item);
 }
 
+/// While several items are selected, the key at one of them moves all of them. Answers false for what does
+/// not go to the trash.
+bool DocumentListController::moveToTrash(const RowItem& item)
+{
+    if (!_trashVerbs.moveToTrash || item.kind == FolderEntryKind::Library)
+        return false;
+    auto items = _editing ? selectedItems() : std::vector<Url>();
+    if (std::ranges::find(items, item.url) == items.end())
+        items = {item.url};
+    _trashVerbs.moveToTrash(items);
+    return true;
+}
+
 bool DocumentListController::obey(kit::RowCommand command, const RowItem& item)
 {
     if (command == kit::RowCommand::Peek)
         return peekAt(item);
+    if (command == kit::RowCommand::Delete && moveToTrash(item))
+        return true;
+    if (_editing)
+        return false;
     constexpr std::pair<kit::RowCommand, DocumentListAction> actions[] = {
         {kit::RowCommand::Rename, DocumentListAction::Rename},
         {kit::RowCommand::Delete, DocumentListAction::Delete},
+        {kit::RowCommand::DeleteForGood, DocumentListAction::Delete},
         {kit::RowCommand::Info, DocumentListAction::Info},
     };
     const auto* action =

@@ -51,6 +51,14 @@ void DocumentListController::addTagsEntry(kit::Menu& menu, std::vector<Url> item
             .image = {}});
 }
 
+void DocumentListController::addTrashEntry(kit::Menu& menu, std::vector<Url> items) const
+{
+    if (_trashVerbs.moveToTrash && !items.empty())
+        menu.push_back({.title = localized("Move to Trash"),
+            .handler = [move = _trashVerbs.moveToTrash, items = std::move(items)] { move(items); },
+            .image = {}});
+}
+
 kit::Menu DocumentListController::optionsMenu()
 {
     kit::Menu menu;
@@ -68,6 +76,7 @@ kit::Menu DocumentListController::optionsMenu()
             .handler = weakly(this, &DocumentListController::deselectAllItems)});
         addDownloadEntries(menu, _downloadVerbs, selectedRowItems());
         addTagsEntry(menu, selectedItems());
+        addTrashEntry(menu, selectedItems());
     }
     const auto firstChoice = menu.size();
     for (const auto& entry : keyEntries)
@@ -89,6 +98,10 @@ kit::Menu DocumentListController::optionsMenu()
     if (_downloadVerbs.showRunning)
         menu.push_back(
             {.title = localized("Downloads"), .handler = _downloadVerbs.showRunning, .beginsSection = true});
+    if (_trashVerbs.show)
+        menu.push_back({.title = localized("Trash"),
+            .handler = _trashVerbs.show,
+            .beginsSection = !_downloadVerbs.showRunning});
     return menu;
 }
 

@@ -96,6 +96,12 @@ public:
     /// these items. Without a function they do not.
     using EditTags = std::function<void(const std::vector<Url>& items)>;
     void setEditTags(EditTags editTags) { _editTags = std::move(editTags); }
+    /// What the menus and keys offer to do with the trash. What has no function is not offered.
+    struct TrashVerbs {
+        std::function<void(const std::vector<Url>& items)> moveToTrash;
+        std::function<void()> show; ///< shows what is in the trash
+    };
+    void setTrashVerbs(TrashVerbs verbs) { _trashVerbs = std::move(verbs); }
 
     /// What the menus offer to do with the contents of items; nothing at first.
     void setDownloadVerbs(DownloadVerbs verbs) { _downloadVerbs = std::move(verbs); }
@@ -125,6 +131,7 @@ public:
     /// Answers the menu of orders and, while the list is editing, of selections.
     kit::Menu optionsMenu();
     void addTagsEntry(kit::Menu& menu, std::vector<Url> items) const;
+    void addTrashEntry(kit::Menu& menu, std::vector<Url> items) const;
 
     /// Other classes attach objects to the list, which keeps them as long as it lives; null removes one. Ask
     /// with the type with which the object was attached, because the type is not checked.
@@ -179,6 +186,7 @@ private:
     // These act on an item of the folder or of the search's results.
     kit::Menu menuFor(const RowItem& item);
     bool obey(kit::RowCommand command, const RowItem& item);
+    bool moveToTrash(const RowItem& item);
     bool peekAt(const RowItem& item);
     bool showPeekAt(const RowItem& item);
     void peekEnded();
@@ -211,6 +219,7 @@ private:
     DocumentListActionSet _availableActions = 0;
     EditTags _editTags;
     DownloadVerbs _downloadVerbs;
+    TrashVerbs _trashVerbs;
     ListOrder _order;
     bool _editing = false;
     std::optional<ListingStage> _state; ///< the stage of the latest update; absent before the first

@@ -36,6 +36,8 @@ constexpr CommandKey commandKeys[] = {
     {GDK_KEY_F2, noModifiers, kit::RowCommand::Rename},
     {GDK_KEY_Delete, noModifiers, kit::RowCommand::Delete},
     {GDK_KEY_KP_Delete, noModifiers, kit::RowCommand::Delete},
+    {GDK_KEY_Delete, GDK_SHIFT_MASK, kit::RowCommand::DeleteForGood},
+    {GDK_KEY_KP_Delete, GDK_SHIFT_MASK, kit::RowCommand::DeleteForGood},
     {GDK_KEY_Return, GDK_ALT_MASK, kit::RowCommand::Info},
     {GDK_KEY_space, noModifiers, kit::RowCommand::Peek},
 };

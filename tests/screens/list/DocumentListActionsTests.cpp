@@ -97,6 +97,47 @@ TEST_F(DocumentList, OffersTheEnabledActionsByMenuAndKeys)
     EXPECT_EQ(delegate->take(), (Lines{"action 2 Notes.txt", "action 3 Notes.txt"}));
 }
 
+TEST_F(DocumentList, OffersTheTrashBesideDeletionButNotToLibraries)
+{
+    makePaintLibrary();
+    const auto list = shownList(*DocumentListController::createRootList()->presentedURL());
+    deliver(list, {{"a.txt"}, {"b.txt"}});
+    list->setAvailableActions(125);
+    Lines moved;
+    list->setTrashVerbs({[&](const std::vector<Url>& items) {
+                             for (const auto& item : items)
+                                 moved.push_back(item.lastPathComponent());
+                         },
+        [&] { moved.emplace_back("shown"); }});
+    const auto titles = [](const kit::Menu& menu) {
+        Lines lines;
+        for (const auto& entry : menu)
+            lines.push_back(entry.title);
+        return lines;
+    };
+    EXPECT_EQ(titles(list->listView()->menuForRow(0)), (Lines{"Info", "Share", "Delete"}));
+    EXPECT_EQ(titles(list->listView()->menuForRow(1)),
+        (Lines{"Info", "Share", "Rename", "Move", "Move to Trash", "Delete"}));
+    list->listView()->menuForRow(1)[4].handler();
+    EXPECT_EQ(list->optionsMenu().back().title, "Trash");
+    list->optionsMenu().back().handler();
+    EXPECT_EQ(std::exchange(moved, {}), (Lines{"a.txt", "shown"}));
+
+    delegate->take();
+    EXPECT_TRUE(list->listView()->commandRow(0, kit::RowCommand::Delete));
+    EXPECT_TRUE(list->listView()->commandRow(1, kit::RowCommand::Delete));
+    EXPECT_TRUE(list->listView()->commandRow(1, kit::RowCommand::DeleteForGood));
+    EXPECT_EQ(std::exchange(moved, {}), Lines{"a.txt"});
+    EXPECT_EQ(delegate->take(), (Lines{"action 0 Documents", "action 0 a.txt"}));
+    list->setEditingAnimated(true, false);
+    list->setSelectedItems({drive.url("a.txt"), drive.url("b.txt")});
+    EXPECT_TRUE(list->listView()->commandRow(2, kit::RowCommand::Delete));
+    EXPECT_EQ(std::exchange(moved, {}), (Lines{"a.txt", "b.txt"}));
+    list->setSelectedItems({drive.url("a.txt")});
+    EXPECT_TRUE(list->listView()->commandRow(2, kit::RowCommand::Delete));
+    EXPECT_EQ(moved, Lines{"b.txt"}) << "the key was pressed at another item";
+}
+
 TEST_F(DocumentList, AHeldRowShowsItsScreenWithWhatCanBeDoneWithIt)
 {
     const auto list = shownList(drive.makeFolder("Stuff"));
