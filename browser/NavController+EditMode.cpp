@@ -54,6 +54,9 @@ void NavController::initNewListController(const List& list)
     list->setAvailableActions(offeredActions);
     list->setEditTags(weakly(this, &NavController::editTagsOfItems));
     list->setDownloadVerbs(downloadVerbs());
+    const bool isRoot = viewControllers().empty() || viewControllers().front() == list;
+    list->setTrashVerbs({weakly(this, &NavController::moveItemsToTrash),
+        isRoot ? std::function<void()>(weakly(this, &NavController::showTrash)) : nullptr});
     configureNavBar(list);
     if (list->title().empty())
         op.warning("Warning: newList title not set");
@@ -132,6 +135,7 @@ void NavController::configureToolbar(const List& list)
     }
     if (!statusBar(*list))
         createStatusBarButtonPressDelegate(*list, _upgradeOffer, self());
+    showTrashButton(list);
     displayStatusBar(*list);
     updateStatusUI(list);
 }

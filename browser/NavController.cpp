@@ -80,6 +80,8 @@ void NavController::observeAccount()
     auto& center = services().notificationCenter();
     _observations.push_back(center.observe(
         Notification::ApplicationDidBecomeActive, weakly(this, &NavController::didBecomeActiveNotification)));
+    _observations.push_back(
+        center.observe(Notification::TrashDidChange, weakly(this, &NavController::countTrash)));
     _observations.push_back(center.observe(Notification::CloudIdentityDidChange,
         weakly(this, &NavController::tarrowAccountAvailabilityChanged)));
 }
@@ -108,6 +110,7 @@ void NavController::setupDrive()
     static constexpr Operation op{"-[NavController setupInitialViewController]"};
     setToolbarHidden(false);
     const auto root = DocumentListController::createRootList();
+    _trashCount = 0;
     op.debug("Contained items: %@", ContainedItems{root});
     if (root) {
         initNewListController(root);
@@ -122,6 +125,7 @@ void NavController::setupDrive()
     _quotaFetcher = QuotaFetcher::init();
     _quotaFetcher->setDelegate(self());
     _quotaFetcher->runWithInterval(quotaInterval);
+    removeOldTrash();
 }
 
 void NavController::setupUnavailableScreen()

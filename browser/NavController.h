@@ -46,6 +46,8 @@ class DownloadsScreen;
 class RunningChanges;
 struct FoundDocuments;
 struct RemovedDownloads;
+class TrashScreen;
+struct TrashingOutcome;
 class UndoHistory;
 struct UndoEntry;
 struct UndoOutcome;
@@ -227,6 +229,10 @@ public:
     /// not be moved.
     void moveItemsToDirectoryAndShowErrorsToDirectory(
         const std::vector<platform::Url>& items, const platform::Url& directory);
+    /// Moves items to the trash, which can be undone.
+    void moveItemsToTrash(const std::vector<platform::Url>& items);
+    /// Shows what is in the trash.
+    void showTrash();
     /// Asks before the selected items of the list on top are deleted.
     void showWarningAndDeleteDocument(const Sender& sender);
     /// Asks before items (documents and folders, or app libraries) are deleted; the sheet points at a view or
@@ -318,6 +324,12 @@ private:
     /// Answers nothing while there is none, or only a short one.
     std::optional<ShownProgress> progressOfDownloads() const;
     void showProgressInLists() { showInLists(&NavController::showProgress); }
+    void beginToTrash(const std::vector<platform::Url>& items);
+    void trashingEnded(const TrashingOutcome& outcome);
+    void removeOldTrash();
+    void countTrash();
+    void trashWasCounted(std::size_t count);
+    void showTrashButton(const List& list);
 
     void beginUndoHistory();
     void offerUndo(std::uint64_t number, const UndoEntry& entry);
@@ -353,6 +365,8 @@ private:
     std::shared_ptr<Downloads> _downloads;
     std::weak_ptr<DownloadsScreen> _downloadsScreen; ///< the one that was shown last
     std::optional<platform::Date> _downloadsSince; ///< when the ones that run began
+    std::weak_ptr<TrashScreen> _trashScreen; ///< the one that was shown last
+    std::size_t _trashCount = 0;
     std::vector<platform::Observation> _observations;
 };
 

@@ -7,6 +7,8 @@
 #include "platform/Dispatch.h"
 #include "platform/FileChanges.h"
 #include "platform/FileCoordinator.h"
+#include "platform/Localization.h"
+#include "screens/DisplayName.h"
 
 #include <chrono>
 
@@ -14,6 +16,7 @@ namespace tarrow {
 
 namespace {
 
+using platform::localized;
 using platform::WritingOptions;
 
 constexpr int mostCopies = 1000; ///< items of one name
@@ -38,6 +41,40 @@ Result<Url> restoreTo(const TrashedItem& item, const Url& target, const FileUtil
         const auto path = services().trash().restore(item.identifier, location.path());
         return path ? Result<Url>(Url::fileURL(*path)) : *path.error;
     });
+}
+
+/// Answers the error of an item that stays as it is.
+Error refusal(FileErrorCode code, const Url& item, std::string sentence)
+{
+    return Error(code,
+        {{std::string(platform::errorKey::localizedDescription), std::move(sentence)},
+            {std::string(platform::errorKey::filePath), item.path()}});
+}
+
+std::string shownName(const Url& url)
+{
+    return screens::displayName(url.lastPathComponent());
+}
+
+/// Moves items back that were moved to the trash, and answers why the others stay there.
+std::vector<Error> moveAllBack(const std::vector<TrashedItem>& items, ItemChange& change)
+{
+    auto outcome = restoreItems(change, items, IfTaken::Refuse);
+    for (const auto& item : outcome.refused)
+        outcome.errors.push_back(refusal(FileErrorCode::ItemExists, TrashUtils::placeOf(item),
+            localized(
+                "“%@” wasn’t put back, because its old place is taken.", {screens::displayName(item.name)})));
+    return outcome.errors;
+}
+
+UndoEntry undoOf(const std::vector<TrashedItem>& items)
+{
+    const auto count = static_cast<std::int64_t>(items.size());
+    auto sentence = count == 1
+        ? localized("“%@” was moved to the trash", {screens::displayName(items.front().name)})
+        : platform::localizedPlural(".DICT.ITEMS_TRASHED.%d", {count});
+    return {std::move(sentence), placesOf(items),
+        [items](ItemChange& change) { return moveAllBack(items, change); }};
 }
 
 } // namespace
@@ -87,6 +124,63 @@ void TrashUtils::removeOld()
     constexpr auto longestStay = std::chrono::nanoseconds(std::chrono::days(daysInTrash));
     if (const auto error = services().trash().removeOlderThan({now.nanoseconds - longestStay.count()}))
         op.warning("Cannot remove what is old in the trash: %@", *error);
+}
+
+TrashingOutcome moveItemsToTrash(ItemChange& change)
+{
+    TrashingOutcome outcome;
+    std::vector<TrashedItem> moved;
+    outcome.errors = change.forEachItem([&](const Url& item) {
+        auto result = TrashUtils::moveToTrash(item, change.stillWanted());
+        if (result)
+            moved.push_back(std::move(*result.value));
+        const bool isChanged =
+            result.error && result.error->is(FileErrorCode::Cancelled) && change.isWanted();
+        return isChanged
+            ? std::optional(refusal(FileErrorCode::Cancelled, item,
+                localized("“%@” wasn’t moved, because another program has changed it.", {shownName(item)})))
+            : result.error;
+    });
+    if (!moved.empty())
+        outcome.undo = undoOf(moved);
+    return outcome;
+}
+
+RestoringOutcome restoreItems(ItemChange& change, const std::vector<TrashedItem>& items, IfTaken ifTaken)
+{
+    RestoringOutcome outcome;
+    auto next = items.begin();
+    outcome.errors = change.forEachItem([&](const Url&) -> std::optional<Error> {
+        const auto& item = *next++;
+        auto result = TrashUtils::restore(item, change.stillWanted());
+        const bool isTaken = result.error && result.error->is(FileErrorCode::ItemExists);
+        if (isTaken && ifTaken == IfTaken::KeepBoth)
+            result = TrashUtils::restoreBeside(item, change.stillWanted());
+        else if (isTaken)
+            outcome.refused.push_back(item);
+        if (result)
+            outcome.restored.push_back(*result);
+        return isTaken && ifTaken == IfTaken::Refuse ? std::nullopt : result.error;
+    });
+    return outcome;
+}
+
+std::vector<Error> removeItemsForGood(ItemChange& change, const std::vector<TrashedItem>& items)
+{
+    auto next = items.begin();
+    return change.forEachItem([&](const Url&) {
+        auto error = services().trash().remove((next++)->identifier);
+        // Another program may have removed it meanwhile.
+        return error && error->is(FileErrorCode::NoSuchItem) ? std::nullopt : error;
+    });
+}
+
+std::vector<Url> placesOf(const std::vector<TrashedItem>& items)
+{
+    std::vector<Url> places;
+    for (const auto& item : items)
+        places.push_back(TrashUtils::placeOf(item));
+    return places;
 }
 
 } // namespace tarrow

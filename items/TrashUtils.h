@@ -3,8 +3,11 @@
 
 #pragma once
 
-#include "items/FileUtils.h"
+#include "items/UndoHistory.h"
 #include "platform/Trash.h"
+
+#include <optional>
+#include <vector>
 
 namespace tarrow {
 
@@ -34,5 +37,28 @@ public:
     /// Removes what has been in the trash for longer than daysInTrash.
     static void removeOld();
 };
+
+/// The outcome of moving items to the trash.
+struct TrashingOutcome {
+    std::vector<Error> errors; ///< of those that stay where they are, each with a sentence
+    std::optional<UndoEntry> undo; ///< nothing when none was moved
+};
+/// Moves the items of a change to the trash. On the change's queue.
+TrashingOutcome moveItemsToTrash(ItemChange& change);
+
+/// The outcome of moving items back from the trash.
+struct RestoringOutcome {
+    std::vector<Url> restored; ///< where they are now
+    std::vector<TrashedItem> refused; ///< their places are taken
+    std::vector<Error> errors; ///< of the others
+};
+enum class IfTaken { Refuse, KeepBoth };
+/// Moves items back; they are those of the change, which has their places. On the change's queue.
+RestoringOutcome restoreItems(ItemChange& change, const std::vector<TrashedItem>& items, IfTaken ifTaken);
+/// Removes items from the trash for good, and answers the errors of those that could not be removed. On the
+/// change's queue.
+std::vector<Error> removeItemsForGood(ItemChange& change, const std::vector<TrashedItem>& items);
+/// Answers the places of items, for a change that works on them.
+std::vector<Url> placesOf(const std::vector<TrashedItem>& items);
 
 } // namespace tarrow

@@ -146,8 +146,13 @@ void createStatusBarButtonPressDelegate(DocumentListController& list, const Offe
 
 void displayStatusBar(DocumentListController& list)
 {
-    if (const auto shown = statusBar(list))
-        list.setToolbarItems(shown->progressItems().empty() ? shown->toolbarItems() : shown->progressItems());
+    const auto shown = statusBar(list);
+    if (!shown)
+        return;
+    auto items = shown->progressItems().empty() ? shown->toolbarItems() : shown->progressItems();
+    if (shown->progressItems().empty() && shown->sideButton())
+        items.push_back(shown->sideButton());
+    list.setToolbarItems(std::move(items));
 }
 
 } // namespace tarrow

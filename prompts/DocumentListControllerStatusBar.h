@@ -39,6 +39,9 @@ public:
     void configureLabels(const Offer& offer);
 
     void setStatusText(const std::string& text);
+    /// Shows a button beside the line; null: none. displayStatusBar() brings it into the toolbar.
+    void setSideButton(std::shared_ptr<kit::BarButtonItem> button) { _sideButton = std::move(button); }
+    const std::shared_ptr<kit::BarButtonItem>& sideButton() const { return _sideButton; }
     /// Gives the button an offer, and shows the button when the offer says that storage is low.
     void showUpgradeOffer(const Offer& offer);
     /// Shows how far a change of items has come, and a button that cancels it, in place of the line and its
@@ -60,6 +63,7 @@ private:
     std::weak_ptr<DocumentListControllerStatusBarDelegate> _delegate;
     kit::BarButtonItems _toolbarItems, _progressItems;
     std::shared_ptr<DriveStatusLabelView> _progressView;
+    std::shared_ptr<kit::BarButtonItem> _sideButton;
 };
 
 // These serve the status bar of a folder list. The list owns its status bar.

@@ -83,7 +83,7 @@ TEST_F(KeyboardTests, KeysThatComeAtOnceArriveWhereTheyWereMeant)
 {
     goTo("to", "To do.txt");
     for (const auto dialog : {deleteKey, f2, f2}) {
-        pressKey(dialog);
+        pressKey(dialog, dialog == deleteKey ? Modifier::Shift : Modifier::None);
         pressKey(escape);
         pressKey(f2);
         pressKey('a', Modifier::Control);
@@ -145,13 +145,13 @@ TEST_F(KeyboardTests, ADocumentIsSeenAndDeleted)
     expectDialog(false);
     expectKeyboardAt("Packing list.md");
 
-    pressKey(deleteKey);
+    pressKey(deleteKey, Modifier::Shift);
     expectKeyboardAt("Cancel");
     pressKey(escape);
     expectDialog(false);
     EXPECT_TRUE(std::filesystem::exists(top / "Desktop/Packing list.md"));
     expectKeyboardAt("Packing list.md");
-    pressKey(deleteKey);
+    pressKey(deleteKey, Modifier::Shift);
     expectKeyboardAt("Cancel");
     pressKey(up);
     expectKeyboardAt("Delete from Tarrow Drive");
@@ -159,6 +159,36 @@ TEST_F(KeyboardTests, ADocumentIsSeenAndDeleted)
     expectGone("Packing list.md");
     EXPECT_FALSE(std::filesystem::exists(top / "Desktop/Packing list.md"));
     expectKeyboardAt("Recipes");
+}
+
+TEST_F(KeyboardTests, ADocumentGoesToTheTrashAndComesBack)
+{
+    const auto document = top / "Desktop/Packing list.md";
+    goTo("pack", "Packing list.md");
+    pressKey(deleteKey);
+    expectGone("Packing list.md");
+    EXPECT_FALSE(std::filesystem::exists(document));
+    EXPECT_TRUE(eventually([this] { return program->says("“Packing list.md” was moved to the trash"); }));
+    pressKey('z', Modifier::Control);
+    expectShown("Packing list.md");
+    type("pack");
+    expectKeyboardAt("Packing list.md");
+    pressKey(deleteKey);
+    expectGone("Packing list.md");
+    // The first press takes the message away.
+    pressKey(escape);
+    if (!eventually([this] { return program->shows("1 in Trash"); }))
+        pressKey(escape);
+    program->pressUntil("1 in Trash", [this] { return program->shows("Empty Trash"); });
+    expectKeyboardAt("Packing list.md");
+    pressKey(returnKey);
+    expectKeyboardAt("Restore");
+    pressKey(returnKey);
+    EXPECT_TRUE(eventually([this] { return program->says("The trash is empty"); }));
+    EXPECT_TRUE(std::filesystem::exists(document));
+    pressKey(escape);
+    expectGone("Empty Trash");
+    expectKeyboardAt("Desktop");
 }
 
 TEST_F(KeyboardTests, ReachesTheRowsFromTheSelectButton)

@@ -139,12 +139,24 @@ std::string Program::state() const
     return answer;
 }
 
+namespace {
+
+/// Answers the last button of this very name, of several that begin so; else the last one.
+const Accessible& namedSo(const std::vector<Accessible>& buttons, const std::string& name)
+{
+    const auto exact =
+        std::find_if(buttons.rbegin(), buttons.rend(), [&](const auto& each) { return each.name() == name; });
+    return exact == buttons.rend() ? buttons.back() : *exact;
+}
+
+} // namespace
+
 void Program::press(const std::string& beginning) const
 {
     // The look is repeated, because a changing bar may remove its buttons between the look and the press.
     EXPECT_TRUE(Accessible::waitFor([&] {
         const auto found = buttons(beginning);
-        return !found.empty() && found.back().press();
+        return !found.empty() && namedSo(found, beginning).press();
     })) << beginning;
 }
 
