@@ -11,7 +11,6 @@
 
 namespace platform {
 
-
 namespace {
 
 /// The main thread waits no longer than this, a frame at most.

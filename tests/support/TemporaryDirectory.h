@@ -15,8 +15,7 @@ namespace testing_support {
 /// A folder for one test, which is removed with everything in it at the end.
 class TemporaryDirectory {
 public:
-    explicit TemporaryDirectory(
-        const std::filesystem::path& above = std::filesystem::temp_directory_path())
+    explicit TemporaryDirectory(const std::filesystem::path& above = std::filesystem::temp_directory_path())
     {
         auto pattern = (above / "tarrow-test-XXXXXX").string();
         if (!mkdtemp(pattern.data()))
