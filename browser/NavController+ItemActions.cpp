@@ -321,7 +321,7 @@ void NavController::documentTargetSelectionControllerDidSelectItemAtURL(
 
 namespace {
 
-/// What became of moving items.
+/// Says what became of moving items.
 struct MovedOutcome {
     std::vector<Error> errors;
     std::optional<UndoEntry> undo;

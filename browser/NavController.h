@@ -147,7 +147,7 @@ public:
     /// Undoes the latest change while a list or an item's details are on top.
     bool undoRequested() override;
 
-    /// What is being downloaded.
+    /// Holds what is being downloaded.
     const std::shared_ptr<Downloads>& downloads() const { return _downloads; }
 
     // In edit mode the user selects several items with check marks.

@@ -11,7 +11,7 @@ void fuzzing::tryInput(std::string_view input)
     const auto value = archiver.unarchive({begin, begin + input.size()});
     if (!value)
         return;
-    // What is not a number never equals itself, so the archives are compared.
+    // A value that is not a number never equals itself, so the archives are compared.
     const auto archive = archiver.archive(*value);
     const auto again = archiver.unarchive(archive);
     require(archive.size() > 65'536 || (again && archiver.archive(*again) == archive),

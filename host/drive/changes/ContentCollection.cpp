@@ -216,7 +216,7 @@ SystemResult<Outcome> ContentCollection::collect(const Names& released)
     const auto from = openOwnFolder(_layout.released()), to = openOwnFolder(_layout.cloud());
     if (!from || !to)
         return from ? to.error : from.error;
-    // What the contents stand for now must be on the disk before they go: the documents that were downloaded.
+    // The documents that were downloaded must be on the disk before their contents go.
     TRW_TRY(syncAll(_layout));
     for (const auto& content : released) {
         if (first->names(content))
@@ -236,7 +236,7 @@ SystemResult<Names> ContentCollection::orphans()
     const auto promised = readPromises(_layout);
     if (!promised)
         return promised.error;
-    // One that was released meanwhile is gone from here.
+    // A content that was released meanwhile is gone from the folder.
     const auto now = namesIn(_layout.cloud());
     if (!now)
         return now.error;

@@ -13,7 +13,7 @@
 
 namespace host::drive {
 
-/// What an item has beside its name and its content: access rights, group and owner, and extended attributes.
+/// Holds what an item has beside its name and its content: access rights, group and owner, and attributes.
 /// A document gets all of it back when it is saved, evicted and downloaded, or copied to another file system.
 struct ItemTraits {
     /// The user attributes and the access list, by name. Those that make a file a promise are left out
