@@ -69,7 +69,7 @@ public:
         const FileDescriptor& folder, const std::string& name, const struct stat& found) override
     {
         // Promises have private names, too, while they are moved or removed.
-        const bool mayPromise = PromiseRecord::itemPathFor(name)
+        const bool mayPromise = PromiseRecord::isPromiseName(name)
             || (name.starts_with(system::passingPrefix)
                 && static_cast<std::uint64_t>(found.st_size) <= PromiseRecord::maximumFileSize);
         if (!mayPromise || !S_ISREG(found.st_mode))

@@ -53,7 +53,7 @@ public:
     SystemError visitItem(
         const FileDescriptor& folder, const std::string& name, const struct stat& found) override
     {
-        if (_store && S_ISREG(found.st_mode) && PromiseRecord::itemPathFor(name)) {
+        if (_store && S_ISREG(found.st_mode) && PromiseRecord::isPromiseName(name)) {
             const auto content = contentOfPromise(folder, name);
             if (!content)
                 return note(content.error);

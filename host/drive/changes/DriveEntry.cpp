@@ -165,7 +165,7 @@ SystemResult<FileDescriptor> openOwnFolder(const std::string& path)
 
 bool isReservedName(std::string_view name)
 {
-    return name.starts_with(host::system::passingPrefix) || PromiseRecord::itemPathFor(name);
+    return name.starts_with(host::system::passingPrefix) || PromiseRecord::isPromiseName(name);
 }
 
 Error reservedName(const std::string& path)

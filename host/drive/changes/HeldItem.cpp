@@ -32,7 +32,7 @@ bool isOnOneFileSystem(const FileDescriptor& a, const FileDescriptor& b)
 std::string heldName(const std::string& name)
 {
     auto held = uniqueName(WorkRecord::heldPrefix);
-    if (PromiseRecord::itemPathFor(name))
+    if (PromiseRecord::isPromiseName(name))
         held += PromiseRecord::suffix;
     return held;
 }

@@ -4,6 +4,7 @@
 #include "host/drive/changes/ItemTraits.h"
 
 #include "host/drive/records/ItemMarks.h"
+#include "host/system/files/DriveNames.h"
 
 #include <sys/stat.h>
 #include <sys/xattr.h>
@@ -28,7 +29,8 @@ constexpr mode_t allRights = 07777;
 bool isKept(std::string_view name)
 {
     return name == accessList
-        || (name.starts_with("user.") && name != itemMark::promise && name != itemMark::type);
+        || (name.starts_with("user.") && name != itemMark::promise && name != itemMark::type
+            && name != system::promisedNameAttribute);
 }
 
 SystemResult<std::string> readAttribute(const FileDescriptor& item, const char* name)

@@ -17,7 +17,7 @@ namespace host::drive {
 /// A document gets all of it back when it is saved, evicted and downloaded, or copied to another file system.
 struct ItemTraits {
     /// The user attributes and the access list, by name. Those that make a file a promise are left out
-    /// (itemMark::promise and itemMark::type).
+    /// (itemMark::promise, itemMark::type and system::promisedNameAttribute).
     std::map<std::string, std::string> attributes;
     mode_t mode = 0; ///< access rights
     uid_t owner = 0;

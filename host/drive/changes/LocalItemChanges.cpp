@@ -12,8 +12,10 @@
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/ItemFacts.h"
 #include "host/drive/records/SmallFile.h"
+#include "host/system/files/DriveNames.h"
 #include "host/system/files/FileVersion.h"
 #include "host/system/files/ItemPaths.h"
+#include "host/system/files/PromisedNames.h"
 #include "host/system/files/SystemErrors.h"
 #include "host/system/texts/Translate.h"
 #include "platform/Log.h"
@@ -37,7 +39,7 @@ namespace {
 /// With it the short form of a promise fits into the inode of its file.
 constexpr const char* contentPrefix = "c-";
 
-PromiseRecord promiseFor(const FileDescriptor& document, const std::string& content)
+PromiseRecord promiseFor(const FileDescriptor& document, const std::string& name, const std::string& content)
 {
     const auto facts = lookAtOpenFile(document);
     PromiseRecord promise;
@@ -50,6 +52,8 @@ PromiseRecord promiseFor(const FileDescriptor& document, const std::string& cont
     promise.documentIdentifier = facts.marks.documentIdentifier;
     promise.tags = facts.marks.tags;
     promise.content = content;
+    if (name.size() > system::longestNameInPromise)
+        promise.longName = name;
     return promise;
 }
 
@@ -194,10 +198,7 @@ std::optional<Error> LocalItemChanges::moveItem(const std::string& from, const s
         return systemError(failure, from, to);
     if (!source->isPromise())
         static_cast<void>(settleTwin(_layout, source->entry, *_store));
-    const auto newName = source->isPromise() ? target->promiseName() : target->name;
-    auto failure = moveWithin(*source, *target, newName);
-    if (failure.is(EXDEV))
-        failure = moveAcross(*source, *target, newName);
+    const auto failure = moveLocated(*source, *target.value);
     // The kernel answers EINVAL when the target lies inside the source, which a mount can hide from the
     // paths.
     if (failure.is(ownFolder) || (failure.is(EINVAL) && S_ISDIR(source->found.st_mode)))
@@ -205,6 +206,23 @@ std::optional<Error> LocalItemChanges::moveItem(const std::string& from, const s
     if (failure)
         return failure.is(changedMeanwhile) ? changeError(failure, from) : systemError(failure, from, to);
     return std::nullopt;
+}
+
+SystemError LocalItemChanges::moveLocated(const LocatedItem& source, const DriveEntry& target)
+{
+    const auto newName = source.isPromise() ? target.promiseName() : target.name;
+    // Only the promise of a long name says it, and that in its own name and in its file, so it says both
+    // names while the first of these changes.
+    const bool saysName =
+        source.isPromise() && (system::isLongPromiseName(source.name) || system::isLongPromiseName(newName));
+    if (saysName)
+        TRW_TRY(system::addPromisedName(source.entry.folder, source.name, target.name));
+    auto failure = moveWithin(source, target, newName);
+    if (failure.is(EXDEV))
+        failure = moveAcross(source, target, newName);
+    if (saysName && !failure)
+        system::settlePromisedName(target.folder, newName, target.name);
+    return failure;
 }
 
 SystemError LocalItemChanges::moveWithin(
@@ -300,7 +318,7 @@ SystemError LocalItemChanges::replaceByPromise(const LocatedItem& item)
     auto file = NewFile::create(_layout, entry, content);
     if (!file)
         return file.error;
-    TRW_TRY(writePromise(file->descriptor(), promiseFor(document, content)));
+    TRW_TRY(writePromise(file->descriptor(), promiseFor(document, entry.name, content)));
     TRW_TRY(traits->ofPromise().write(file->descriptor()));
     // While both exist the document counts. Both names change in one journal, in this order, so one sync at
     // the end is enough.

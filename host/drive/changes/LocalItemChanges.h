@@ -48,6 +48,9 @@ public:
 
     /// Removes an item for good, with the contents behind its promises.
     system::SystemError removeLocated(const LocatedItem& item);
+    /// Gives an item another place, also on another file system, in the form that a promise of the new name
+    /// has. The place must have been found free.
+    system::SystemError moveLocated(const LocatedItem& source, const DriveEntry& target);
     /// Renames an item, whatever it is by now. Errors: EXDEV when the target is on another file system.
     static system::SystemError moveWithin(
         const LocatedItem& source, const DriveEntry& target, const std::string& newName);

@@ -15,6 +15,7 @@
 #include "host/system/files/DirectoryReader.h"
 #include "host/system/files/DriveNames.h"
 #include "host/system/files/ItemPaths.h"
+#include "host/system/files/PromisedNames.h"
 #include "host/system/files/SystemErrors.h"
 #include "platform/Log.h"
 
@@ -46,10 +47,12 @@ DriveEntry renamed(const DriveEntry& entry, const char* prefix)
         prefix + entry.name.substr(entry.name.find('-') + 1), entry.path};
 }
 
-/// Answers the path of the document that a promise's name stands for. Any other name stands for itself.
-std::string documentPath(const std::string& path)
+/// Answers the path of the document for which a promise belongs at a path; the promise may lie at another one
+/// for the moment. Any other path stands for itself.
+std::string documentPath(const std::string& path, const std::string& promise)
 {
-    return PromiseRecord::itemPathFor(path).value_or(path);
+    auto name = system::promisedName(promise, lastName(path));
+    return name ? system::siblingPath(path, *name) : PromiseRecord::itemPathFor(path).value_or(path);
 }
 
 /// Gives the held name to an item and its name to the held one, in one step.
@@ -67,12 +70,13 @@ void removeLastCharacter(std::string& text)
     text.pop_back();
 }
 
-/// Answers a name with a number, both of at most the length of a name on disk, also as a promise.
+/// Answers a name with a number, which a promise can say in its own name.
 std::string numberedName(std::string name, int number)
 {
-    constexpr std::size_t longest = 255 - PromiseRecord::suffix.size() - 1;
-    const auto suffix = number > 1 ? ' ' + std::to_string(number) : std::string();
-    while (name.size() + suffix.size() > longest)
+    if (number == 1)
+        return name;
+    const auto suffix = ' ' + std::to_string(number);
+    while (name.size() + suffix.size() > system::longestNameInPromise)
         removeLastCharacter(name);
     return name + suffix;
 }
@@ -103,7 +107,9 @@ public:
 private:
     void note(const FileDescriptor& folder, const std::string& name)
     {
-        if (name.starts_with(system::passingPrefix))
+        const bool isPromise =
+            system::isLongPromiseName(name) && !system::promisedName(folder, name).error.is(EBADMSG);
+        if (name.starts_with(system::passingPrefix) && !isPromise)
             paths.push_back(pathOf(folder) + '/' + name);
     }
 };
@@ -143,7 +149,8 @@ bool Recovery::settle(const WorkRecord::Places& places)
     // Nobody changes the item meanwhile. A program that hangs keeps only its own item from being settled.
     constexpr std::chrono::milliseconds patience(500);
     const system::LockFile locks(_layout.coordination());
-    const auto kept = locks.acquire({{documentPath(places.item), system::LockMode::Exclusive}}, patience);
+    const auto kept =
+        locks.acquire({{documentPath(places.item, places.working), system::LockMode::Exclusive}}, patience);
     if (kept.error.is(EBUSY))
         return false;
     return lastName(places.working).starts_with(WorkRecord::temporaryPrefix) ? settleCopy(places)
@@ -175,7 +182,7 @@ SystemError Recovery::removeCopy(const std::string& path) const
 /// Settles a promise beside its document, after a download or an eviction.
 SystemError Recovery::settlePromise(const WorkRecord::Places& places)
 {
-    const auto document = entryAt(documentPath(places.item));
+    const auto document = entryAt(documentPath(places.item, places.item));
     if (!document)
         return saysGone(*document.error) ? SystemError() : SystemError(EIO, places.item);
     if (!places.content.empty()) {
@@ -291,12 +298,14 @@ bool Recovery::moveToTrash(const DriveEntry& held, const std::string& item)
     constexpr int mostOfOneName = 1000;
     const auto trash = openOwnFolder(_layout.trash());
     const auto path = descriptorPath(held.folder) + '/' + held.name;
-    ::lsetxattr(path.c_str(), itemMark::origin, item.data(), item.size(), 0);
-    const auto document = PromiseRecord::itemPathFor(lastName(item));
+    const auto document = documentPath(item, path);
+    const bool isPromise = document != item;
+    ::lsetxattr(path.c_str(), itemMark::origin, document.data(), document.size(), 0);
     auto failure = trash ? SystemError(EEXIST) : trash.error;
     for (int number = 1; failure.is(EEXIST) && number < mostOfOneName; ++number) {
-        const auto name = numberedName(document.value_or(std::string(lastName(item))), number);
-        failure = renameEntry(held.folder, held.name, *trash, document ? PromiseRecord::pathFor(name) : name);
+        const auto name = numberedName(std::string(lastName(document)), number);
+        failure =
+            renameEntry(held.folder, held.name, *trash, isPromise ? PromiseRecord::pathFor(name) : name);
     }
     if (!failure)
         op.warning("Cannot put back %@: it is in the trash now", item);
@@ -336,6 +345,8 @@ void Recovery::settleStray(const DriveEntry& stray, const std::string& item)
     else if (stray.name.starts_with(WorkRecord::movedPrefix)
         || stray.name.starts_with(WorkRecord::temporaryPrefix))
         discard(stray, false);
+    else if (system::isLongPromiseName(stray.name)) // it says no name that belongs to it
+        moveToTrash(stray, PromiseRecord::pathFor(item));
 }
 
 SystemError Recovery::settleStraysAmongItems()

@@ -9,6 +9,7 @@
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/ItemMarks.h"
 #include "host/system/files/AtomicWrite.h"
+#include "host/system/files/DriveNames.h"
 
 #include <fcntl.h>
 #include <sys/xattr.h>
@@ -40,7 +41,7 @@ FileDescriptor openForReading(const FileDescriptor& folder, const std::string& n
 SystemError copyPromise(const FileDescriptor& from, const FileDescriptor& to)
 {
     const AttributeReader attributes(from);
-    for (const char* name : {itemMark::promise, itemMark::type}) {
+    for (const char* name : {itemMark::promise, itemMark::type, system::promisedNameAttribute}) {
         const auto value = attributes.value(name);
         if (value && ::fsetxattr(to.get(), name, value->data(), value->size(), 0) != 0)
             return SystemError::last(name);

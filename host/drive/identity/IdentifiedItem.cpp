@@ -6,6 +6,7 @@
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/ItemFacts.h"
 #include "host/drive/records/PromiseFile.h"
+#include "host/system/files/ItemPaths.h"
 
 #include <fcntl.h>
 #include <sys/xattr.h>
@@ -87,7 +88,7 @@ Result<platform::DocumentIdentifiers::OpenFile::Attributes> IdentifiedItem::attr
 
 std::uint32_t identifierAt(const std::string& physicalPath)
 {
-    if (PromiseRecord::itemPathFor(physicalPath))
+    if (PromiseRecord::isPromiseName(system::lastName(physicalPath)))
         return readPromise(physicalPath).value.value_or(PromiseRecord()).documentIdentifier;
     return documentIdentifierAt(physicalPath);
 }

@@ -7,7 +7,11 @@
 #include "host/drive/records/ItemMarks.h"
 #include "host/drive/records/SmallFile.h"
 #include "host/system/files/AtomicWrite.h"
+#include "host/system/files/DriveNames.h"
+#include "host/system/files/ItemPaths.h"
 #include "host/system/files/PosixFileSystem.h"
+#include "host/system/files/PromisedNames.h"
+#include "platform/Url.h"
 
 #include <fcntl.h>
 #include <sys/xattr.h>
@@ -52,6 +56,13 @@ std::optional<Result<PromiseRecord>> readShortForm(const AttributeReader& file, 
     return marked(std::move(*promise), file);
 }
 
+/// Writes no empty attribute.
+SystemError writeAttribute(const FileDescriptor& file, const char* name, const std::string& value)
+{
+    return SystemError::unless(
+        value.empty() || ::fsetxattr(file.get(), name, value.data(), value.size(), 0) == 0, name);
+}
+
 Result<PromiseRecord> readJson(Result<std::string> text, const AttributeReader& file, const std::string& path)
 {
     if (!text)
@@ -66,6 +77,13 @@ Result<PromiseRecord> readJson(Result<std::string> text, const AttributeReader& 
 
 Result<PromiseRecord> readPromise(const std::string& path)
 {
+    if (system::isLongPromiseName(system::lastName(path))) {
+        const auto name = system::promisedName(path);
+        if (name.error.is(EBADMSG))
+            return damagedRecord(path, "it does not say the name that belongs to it");
+        if (!name)
+            return itemError(name.error, path);
+    }
     const AttributeReader file(path);
     if (auto promise = readShortForm(file, path))
         return std::move(*promise);
@@ -89,11 +107,15 @@ SystemResult<PromiseRecord> readPromise(const FileDescriptor& file)
 SystemError writePromise(const FileDescriptor& file, const PromiseRecord& promise)
 {
     const auto form = promise.shortForm();
-    if (::fsetxattr(file.get(), itemMark::promise, form.data(), form.size(), 0) == 0)
+    if (::fsetxattr(file.get(), itemMark::promise, form.data(), form.size(), 0) == 0) {
+        TRW_TRY(writeAttribute(file, system::promisedNameAttribute, promise.longName));
         return writeMarks(file, promise);
+    }
     if (errno != EOPNOTSUPP)
         return SystemError::last();
-    return system::writeWhole(file, promise.toJson());
+    // JSON holds text only, and a name that is none would not be the item's any more.
+    const bool canSayName = platform::isValidUtf8(promise.longName);
+    return canSayName ? system::writeWhole(file, promise.toJson()) : SystemError(EILSEQ);
 }
 
 SystemError writeIdentifier(const FileDescriptor& file, std::uint32_t identifier)
@@ -115,10 +137,8 @@ SystemError writeMarks(const FileDescriptor& file, const PromiseRecord& promise)
         {itemMark::role, promise.role ? nameOf(*promise.role) : ""},
         {system::hiddenExtensionAttribute, promise.extensionHidden ? "1" : ""},
         {itemMark::type, promise.type}};
-    for (const auto& [name, value] : marks) {
-        if (!value.empty() && ::fsetxattr(file.get(), name, value.data(), value.size(), 0) != 0)
-            return SystemError::last(name);
-    }
+    for (const auto& [name, value] : marks)
+        TRW_TRY(writeAttribute(file, name, value));
     return {};
 }
 

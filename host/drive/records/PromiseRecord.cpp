@@ -5,6 +5,7 @@
 
 #include "host/drive/records/ItemMarks.h"
 #include "host/system/files/ItemPaths.h"
+#include "host/system/files/PromisedNames.h"
 
 #include <nlohmann/json.hpp>
 
@@ -167,6 +168,8 @@ std::string PromiseRecord::toJson() const
         promise["tags"] = tags;
     if (!content.empty())
         promise["content"] = content;
+    if (!longName.empty())
+        promise["name"] = longName;
     return promise.dump(-1, ' ', false, json::error_handler_t::replace) + '\n';
 }
 
@@ -207,11 +210,15 @@ std::string PromiseRecord::pathFor(std::string_view itemPath)
     return system::promisePath(itemPath);
 }
 
+bool PromiseRecord::isPromiseName(std::string_view name)
+{
+    return system::isLongPromiseName(name) || system::itemName(name) != name;
+}
+
 std::optional<std::string> PromiseRecord::itemPathFor(std::string_view promisePath)
 {
-    const auto promise = system::lastName(promisePath);
-    const auto name = system::itemName(promise);
-    return name == promise ? std::nullopt : std::optional(system::siblingPath(promisePath, name));
+    const auto name = system::promisedName(std::string(promisePath));
+    return name ? std::optional(system::siblingPath(promisePath, *name)) : std::nullopt;
 }
 
 } // namespace host::drive

@@ -34,6 +34,9 @@ struct PromiseRecord {
     std::uint32_t documentIdentifier = 0; ///< 0: none
     std::vector<std::string> tags;
     std::string content; ///< name of the content in the account's cloud folder; empty: there is none
+    /// The item's name, where it is too long for the name of the promise to say it. It is only written;
+    /// system::promisedName() reads it.
+    std::string longName;
 
     bool operator==(const PromiseRecord&) const = default;
 
@@ -50,8 +53,10 @@ struct PromiseRecord {
 
     /// Answers the path of an item's promise, which is a hidden file beside it.
     static std::string pathFor(std::string_view itemPath);
+    /// Answers whether a name has the form of a promise's.
+    static bool isPromiseName(std::string_view name);
     /// Answers the path of the item for which the promise at this path stands, or nothing when the name is
-    /// not a promise's.
+    /// not a promise's. The name of an item that is too long for that is read from the promise.
     static std::optional<std::string> itemPathFor(std::string_view promisePath);
 };
 

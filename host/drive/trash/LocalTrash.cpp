@@ -111,8 +111,7 @@ Result<TrashedItem> LocalTrash::moveToTrash(
     const auto item = LocatedItem::locate(_layout, path);
     if (!item)
         return *item.error;
-    auto origin = path.substr(_layout.documents().size() + 1);
-    origin = PromiseRecord::itemPathFor(origin).value_or(origin);
+    auto origin = PromiseRecord::itemPathFor(path).value_or(path).substr(_layout.documents().size() + 1);
     if (isContainer(origin) || system::isPassingName(item->entry.name))
         return Error(FileErrorCode::Unsupported);
     if (unchangedSince && versionOf(item->found) != *unchangedSince)
@@ -231,18 +230,16 @@ Result<std::string> LocalTrash::restore(
     const auto entry = DriveEntry::open(_layout, path);
     if (!entry)
         return *entry.error;
-    const auto newName = item.isPromise() ? entry->promiseName() : entry->name;
     auto failure = entry->checkIsFree();
     if (!failure)
-        failure = LocalItemChanges::moveWithin(item, *entry.value, newName);
-    if (failure.is(EXDEV))
-        failure = _changes->moveAcross(item, *entry.value, newName);
+        failure = _changes->moveLocated(item, *entry.value);
     if (failure)
         return changeError(failure, path);
+    const auto nameOnDisk = item.isPromise() ? entry->promiseName() : entry->name;
     if (found->place)
         found->place->dropIfEmpty(found->trash);
     else
-        ::lremovexattr((descriptorPath(entry->folder) + '/' + newName).c_str(), itemMark::origin);
+        ::lremovexattr((descriptorPath(entry->folder) + '/' + nameOnDisk).c_str(), itemMark::origin);
     return path;
 }
 

@@ -7,6 +7,7 @@
 #include "host/drive/changes/WorkRecord.h"
 #include "host/system/files/DirectoryReader.h"
 #include "host/system/files/ItemPaths.h"
+#include "host/system/files/PromisedNames.h"
 
 #include <fcntl.h>
 
@@ -25,7 +26,9 @@ SystemResult<LocatedItem> locateIn(
     const auto found = statusAt(folder, nameOnDisk);
     if (!found)
         return found.error;
-    auto name = system::itemName(nameOnDisk);
+    // Something may have the name of a promise and be none.
+    auto promised = system::promisedName(folder, nameOnDisk);
+    auto name = promised ? std::move(*promised) : nameOnDisk;
     FileDescriptor own(::fcntl(folder.get(), F_DUPFD_CLOEXEC, 0));
     if (!own)
         return SystemError::last(nameOnDisk);

@@ -5,6 +5,7 @@
 
 #include "host/system/files/FileVersion.h"
 #include "host/system/files/ItemPaths.h"
+#include "host/system/files/PromisedNames.h"
 
 #include <fcntl.h>
 
@@ -52,12 +53,13 @@ std::optional<std::string> PresentedItem::whereabouts() const
     if (length <= 0)
         return std::nullopt;
     const std::string path(buffer.data(), static_cast<std::size_t>(length));
-    const auto name = itemName(lastName(path));
+    auto promised = promisedName(path);
+    const auto name = promised ? std::move(*promised) : std::string(lastName(path));
     // The kernel names a removed file too, with a remark at the end that could be part of a name, so the file
     // is checked.
     struct stat status;
-    if (isPassingName(name) || ::lstat(path.c_str(), &status) != 0 || status.st_dev != _version.device
-        || status.st_ino != _version.inode)
+    if (isPassingName(name) || isLongPromiseName(name) || ::lstat(path.c_str(), &status) != 0
+        || status.st_dev != _version.device || status.st_ino != _version.inode)
         return std::nullopt;
     return siblingPath(path, name);
 }

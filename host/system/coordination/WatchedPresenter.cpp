@@ -5,6 +5,7 @@
 
 #include "host/system/coordination/PresenterNotices.h"
 #include "host/system/files/ItemPaths.h"
+#include "host/system/files/PromisedNames.h"
 #include "platform/Log.h"
 
 #include <sys/inotify.h>
@@ -126,7 +127,8 @@ void WatchedPresenter::mark(const Inotify::Event& event, const IsOwn& isOwn)
     for (auto& each : _links) {
         if (each.watch != event.watch)
             continue;
-        _isDue |= event.isLoss() || itemName(event.name) == each.name;
+        _isDue |= event.isLoss() || itemName(event.name) == each.name
+            || (isLongPromiseName(event.name) && event.name == promisePath(each.name));
         if (event.mask & IN_IGNORED)
             each.watch = -1;
     }
@@ -140,7 +142,16 @@ void WatchedPresenter::markInside(const Inotify::Event& event, const IsOwn& isOw
         _inside = -1;
     if (event.isLoss())
         return markMissed();
-    const auto name = itemName(event.name);
+    auto name = itemName(event.name);
+    if (isLongPromiseName(name)) {
+        auto promised = promisedName(_item.path() + '/' + name);
+        // A promise that is gone says its name no more, so only the change of the folder is told.
+        if (!promised) {
+            _isDue = _isInsideChanged = true;
+            return;
+        }
+        name = std::move(*promised);
+    }
     if (name.empty() || isPassingName(name) || isOwn(_item.path() + '/' + name))
         return;
     _isDue = _isInsideChanged = true;

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include <cstddef>
 #include <string_view>
 
 namespace host::system {
@@ -10,6 +11,13 @@ namespace host::system {
 /// These names have a meaning in the drive's folders. The promise of NAME is the file ".NAME" with this
 /// suffix.
 inline constexpr std::string_view promiseSuffix = ".trwpromise";
+/// The promise of a longer name than this many bytes has no room for the suffix. It is the file with this
+/// prefix and the SHA-256 of the name in hexadecimal digits.
+inline constexpr std::size_t longestNameInPromise = 255 - 1 - promiseSuffix.size();
+inline constexpr std::string_view longPromisePrefix = ".trwlong-";
+/// The attribute of such a promise that says its name. While it is being renamed it says both names, with a
+/// slash between them; the one that belongs to the file's name counts.
+inline constexpr const char* promisedNameAttribute = "user.trw.name";
 /// The prefix of the private names of items that are being written, moved or removed.
 inline constexpr std::string_view passingPrefix = ".trw";
 /// The extension of a reference, a small file that stands for a document of a container.

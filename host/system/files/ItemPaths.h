@@ -18,8 +18,11 @@ std::string_view lastName(std::string_view path);
 std::string siblingPath(std::string_view path, std::string_view name);
 /// Answers the path of an item's promise.
 std::string promisePath(std::string_view path);
-/// Answers the name of the item for which a promise of this name stands. Any other name stays as it is.
+/// Answers the name of the item for which a promise of this name stands. Any other name stays as it is, also
+/// that of a promise with a long name (PromisedNames.h).
 std::string itemName(std::string_view name);
+/// Answers whether a name has the form that the promises of long names have.
+bool isLongPromiseName(std::string_view name);
 /// Answers whether a name is the drive's private name of an item that is being written, moved or removed.
 bool isPassingName(std::string_view name);
 /// Answers whether an item or its promise exists.

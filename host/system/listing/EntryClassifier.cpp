@@ -4,6 +4,10 @@
 #include "host/system/listing/EntryClassifier.h"
 
 #include "host/system/files/DriveNames.h"
+#include "host/system/files/ItemPaths.h"
+#include "host/system/files/PromisedNames.h"
+
+#include <cerrno>
 
 namespace host::system {
 
@@ -36,17 +40,33 @@ FolderEntryKind EntryClassifier::kindOfFolder(std::string_view name) const
     return _types->isPackageExtension(extensionOf(name)) ? FolderEntryKind::Package : FolderEntryKind::Folder;
 }
 
+std::optional<FolderEntry> EntryClassifier::promised(std::string_view name) const
+{
+    if (name.starts_with('.'))
+        return std::nullopt; // it is the promise of a hidden item
+    const bool isPackage = kindOfFolder(name) == FolderEntryKind::Package;
+    return FolderEntry{name, isPackage ? FolderEntryKind::Package : kindOfFile(name), true};
+}
+
+std::optional<FolderEntry> EntryClassifier::classify(
+    const FileDescriptor& folder, std::string_view name, FileType type, std::string& longName) const
+{
+    if (!isLongPromiseName(name))
+        return classify(name, type);
+    auto read = type == FileType::Regular ? promisedName(folder, name) : SystemError(EBADMSG);
+    if (!read)
+        return std::nullopt;
+    longName = std::move(*read);
+    return promised(longName);
+}
+
 std::optional<FolderEntry> EntryClassifier::classify(std::string_view name, FileType type) const
 {
     if (name.starts_with('.')) {
         if (type != FileType::Regular || !name.ends_with(promiseSuffix)
             || name.size() <= promiseSuffix.size() + 1)
             return std::nullopt;
-        const auto promised = name.substr(1, name.size() - 1 - promiseSuffix.size());
-        if (promised.starts_with('.'))
-            return std::nullopt; // it is the promise of a hidden item
-        const bool isPackage = kindOfFolder(promised) == FolderEntryKind::Package;
-        return FolderEntry{promised, isPackage ? FolderEntryKind::Package : kindOfFile(promised), true};
+        return promised(name.substr(1, name.size() - 1 - promiseSuffix.size()));
     }
     switch (type) {
     case FileType::Directory:

@@ -4,11 +4,13 @@
 #pragma once
 
 #include "host/system/desktop/MimeTypeRegistry.h"
+#include "host/system/files/FileDescriptor.h"
 #include "platform/FileSystem.h"
 #include "platform/FolderSnapshot.h"
 
 #include <memory>
 #include <optional>
+#include <string>
 #include <string_view>
 
 namespace host::system {
@@ -24,8 +26,13 @@ public:
     /// Answers the entry that the list shows, whose name is the logical one and a part of `name`, or nothing
     /// for a hidden item. A promise is shown as a document, or as a package when its name says so.
     std::optional<platform::FolderEntry> classify(std::string_view name, platform::FileType type) const;
+    /// Does so for an entry of an open folder, also for the promise of a long name, which is read into
+    /// `longName`. The entry's name is a part of that then.
+    std::optional<platform::FolderEntry> classify(const FileDescriptor& folder, std::string_view name,
+        platform::FileType type, std::string& longName) const;
 
 private:
+    std::optional<platform::FolderEntry> promised(std::string_view name) const;
     platform::FolderEntryKind kindOfFolder(std::string_view name) const;
 
     std::shared_ptr<const MimeTypeRegistry> _types;

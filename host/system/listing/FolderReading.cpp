@@ -128,6 +128,7 @@ void FolderReading::readBlock()
 std::shared_ptr<ListingBlock> FolderReading::fillBlock()
 {
     auto block = std::make_shared<ListingBlock>();
+    std::string longName;
     while (block->count() < blockEntries) {
         const auto found = _reader->next();
         if (!found)
@@ -135,7 +136,7 @@ std::shared_ptr<ListingBlock> FolderReading::fillBlock()
         const auto type = found->type ? found->type : typeOfEntry(_descriptor, found->name);
         if (!type)
             continue; // it was removed since the folder was read
-        if (const auto entry = _tools->classifier.classify(found->name, *type))
+        if (const auto entry = _tools->classifier.classify(_descriptor, found->name, *type, longName))
             block->append(*entry);
     }
     return block;

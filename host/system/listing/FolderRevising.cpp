@@ -4,11 +4,13 @@
 #include "host/system/listing/FolderRevising.h"
 
 #include "host/system/files/DriveNames.h"
+#include "host/system/files/ItemPaths.h"
 
 #include <algorithm>
 #include <array>
 #include <numeric>
 #include <unordered_map>
+#include <unordered_set>
 #include <utility>
 
 namespace host::system {
@@ -50,6 +52,7 @@ private:
     };
     using Stayed = std::pair<std::uint32_t, Look>;
 
+    void lookAtItem(const FileDescriptor& folder, std::string_view name);
     Look look(const FileDescriptor& folder, const std::string& name) const;
     void place(std::uint32_t index, const FolderEntry& entry, Look& look);
     bool isBefore(std::size_t index, std::size_t newcomer) const;
@@ -73,27 +76,42 @@ private:
 /// Looks at the item for which a reported name stands.
 void Revising::lookAt(const FileDescriptor& folder, std::span<const std::string> names)
 {
+    std::unordered_set<std::string> longPromises;
+    std::string longName;
     for (const auto& name : names) {
+        if (isLongPromiseName(name))
+            longPromises.insert(name);
         // A promise's file has a hidden name, which stands for the promised item.
-        const auto listed = _tools.classifier.classify(name, FileType::Regular);
-        if (!listed)
-            continue;
-        const auto [found, isNew] = _looks.try_emplace(std::string(listed->name));
-        if (isNew)
-            found->second = look(folder, found->first);
+        const auto listed = _tools.classifier.classify(folder, name, FileType::Regular, longName);
+        if (listed)
+            lookAtItem(folder, listed->name);
     }
+    // The promise of a long name that is gone says its name no more, so the list is searched for it.
+    for (std::size_t index = 0; !longPromises.empty() && index < _before.count(); ++index) {
+        const auto name = _before.entry(index).name;
+        if (name.size() > longestNameInPromise && longPromises.contains(promisePath(name)))
+            lookAtItem(folder, name);
+    }
+}
+
+void Revising::lookAtItem(const FileDescriptor& folder, std::string_view name)
+{
+    const auto [found, isNew] = _looks.try_emplace(std::string(name));
+    if (isNew)
+        found->second = look(folder, found->first);
 }
 
 Look Revising::look(const FileDescriptor& folder, const std::string& name) const
 {
     Look found;
     const auto type = typeOfEntry(folder, name);
-    const auto promise = '.' + name + std::string(promiseSuffix);
+    const auto promise = promisePath(name);
+    std::string longName;
     std::optional<FolderEntry> entry;
     if (type)
         entry = _tools.classifier.classify(name, *type);
     else if (const auto promiseType = typeOfEntry(folder, promise))
-        entry = _tools.classifier.classify(promise, *promiseType);
+        entry = _tools.classifier.classify(folder, promise, *promiseType, longName);
     if (entry)
         found = {true, entry->isPromise, false, entry->kind};
     return found;
@@ -210,7 +228,7 @@ std::shared_ptr<const FolderSnapshot> Revising::make(const std::shared_ptr<const
 
 bool mayBeListed(std::string_view name)
 {
-    return !name.starts_with('.') || name.ends_with(promiseSuffix);
+    return !name.starts_with('.') || name.ends_with(promiseSuffix) || isLongPromiseName(name);
 }
 
 std::shared_ptr<const FolderSnapshot> revisedList(const ListingTools& tools, FolderGrouping grouping,

@@ -8,6 +8,7 @@
 #include "host/drive/changes/Recovery.h"
 #include "host/drive/records/PromiseFile.h"
 #include "host/drive/trash/LocalTrash.h"
+#include "host/system/files/DriveNames.h"
 
 #include <sys/syscall.h>
 
@@ -30,6 +31,10 @@ using host::drive::TrashRecord;
 constexpr const char* trashedFolder = ".trwtrash-1";
 /// What stands in the picture of a drive for a promise's tag.
 constexpr const char* tagged = "tagged";
+
+/// Names that are too long for the suffix of a promise.
+const std::string longDocument = "long/" + std::string(250, 'd'),
+                  longPromise = "long/" + std::string(255, 'p');
 
 void PrintTo(const Operation& operation, std::ostream* stream)
 {
@@ -54,13 +59,16 @@ std::vector<Operation> operations()
         {"restoreAcross", {"restore", trashedFolder}, FileSystems::Several},
         {"drop", {"drop", trashedFolder}}, {"save", {"save", "inner/file.txt", "folder/a.txt"}},
         {"evict", {"evict", "inner/file.txt"}}, {"fetch", {"fetch", "inner/p.txt"}},
-        {"tagPromise", {"tag", "inner/p.txt", "Red", "Blue"}}};
+        {"tagPromise", {"tag", "inner/p.txt", "Red", "Blue"}}, {"evictLong", {"evict", longDocument}},
+        {"fetchLong", {"fetch", longPromise}}, {"renameLong", {"move", longPromise, longDocument + "x"}},
+        {"shortenLong", {"move", longPromise, "inner/new.txt"}},
+        {"lengthenPromise", {"move", "inner/p.txt", longDocument + "x"}}};
 }
 
 void SweepFixture::makeDrive() const
 {
     fs::remove_all(_layout.home());
-    for (const auto& folder : {"inner", "folder/sub", "folder/empty", "target", "gone"})
+    for (const auto& folder : {"inner", "folder/sub", "folder/empty", "target", "gone", "long"})
         fs::create_directories(at(folder));
     fs::create_directories(_layout.cloud());
     write(at("inner/file.txt"), std::string(100'000, 'f'));
@@ -72,6 +80,8 @@ void SweepFixture::makeDrive() const
     write(at("inner/twin.txt"), "of the document");
     promise("inner/twin.txt", "that nobody has seen");
     promise("bystander.pdf", "kept");
+    write(at(longDocument), "dddd");
+    promise(longPromise, "llll");
     promise("gone/q.pdf", "qqq");
     write(at("gone/q.txt"), "text");
     fs::create_directories(_layout.trash() + '/' + trashedFolder);
@@ -147,7 +157,7 @@ void SweepFixture::addItems(Drive& drive, const std::string& folder, const std::
         const auto path = each->path().string();
         const auto shown = prefix.empty() ? path : prefix + path.substr(folder.size() + 1);
         if (const auto item = PromiseRecord::itemPathFor(path)) {
-            const auto promised = prefix.empty() ? *item : *PromiseRecord::itemPathFor(shown);
+            const auto promised = prefix.empty() ? *item : prefix + item->substr(folder.size() + 1);
             drive["promise of " + promised] = behind(path);
             for (const auto& tag : host::drive::readPromise(path).value.value_or(PromiseRecord()).tags)
                 drive["tag " + tag + " of " + promised] = tagged;
@@ -211,8 +221,8 @@ std::vector<std::string> SweepFixture::leftovers() const
             ++contents;
         else if (isInTrash(path))
             continue;
-        else if (name.starts_with(".trw") || path.starts_with(_layout.held() + '/')
-            || path.starts_with(_layout.trash() + '/'))
+        else if ((name.starts_with(".trw") && !PromiseRecord::itemPathFor(path))
+            || path.starts_with(_layout.held() + '/') || path.starts_with(_layout.trash() + '/'))
             found.push_back(path.substr(_layout.home().size() + 1));
     }
     // A copied promise names the same content, and no two contents here are alike.
@@ -301,7 +311,9 @@ std::string SweepFixture::read(const std::string& path)
 void SweepFixture::promise(const std::string& path, const std::string& content) const
 {
     PromiseRecord record;
-    record.content = "content of " + fs::path(path).filename().string();
+    const auto name = fs::path(path).filename().string();
+    record.longName = name.size() > host::system::longestNameInPromise ? name : std::string();
+    record.content = "content of " + name.substr(0, 99);
     record.size = content.size();
     record.modified = platform::Date{1'600'000'000'000'000'000};
     write(_layout.cloud() + '/' + record.content, content);

@@ -4,16 +4,20 @@
 #include "host/system/listing/ThreadedFolderLister.h"
 
 #include "host/system/desktop/MimeTypeRegistry.h"
+#include "host/system/files/ItemPaths.h"
+#include "host/system/files/PromisedNames.h"
 #include "host/system/queues/GLibDispatch.h"
 #include "tests/support/TemporaryDirectory.h"
 #include "tests/support/VirtualDispatch.h"
 
+#include <fcntl.h>
 #include <glib.h>
 #include <gtest/gtest.h>
 #include <sys/stat.h>
 
 #include <algorithm>
 #include <filesystem>
+#include <fstream>
 #include <numeric>
 #include <random>
 #include <thread>
@@ -110,6 +114,26 @@ TEST_F(FolderListerTest, PromisesShowAsWhatTheyPromiseUnlessItIsHere)
     EXPECT_FALSE(snapshot->entry(2).isPromise);
     EXPECT_TRUE(snapshot->entry(3).isPromise);
     EXPECT_EQ(snapshot->url(3), Url::fileURL(directory.at("far.txt")));
+}
+
+TEST_F(FolderListerTest, FollowsThePromisesOfLongNames)
+{
+    const std::string first(250, 'a'), second(255, 'b');
+    const auto promise = [&](const std::string& name) { return promisePath(directory.at(name)); };
+    std::ofstream(promise(first)) << R"({"name": ")" + first + R"("})";
+    const auto listing = list(directory.path());
+    dispatch->runUntilIdle();
+    ASSERT_EQ(names(updates.back()), std::vector{first});
+    EXPECT_TRUE(updates.back()->entry(0).isPromise);
+
+    const FileDescriptor folder(::open(directory.path().c_str(), O_PATH | O_CLOEXEC));
+    ASSERT_FALSE(addPromisedName(folder, std::string(lastName(promise(first))), second));
+    std::filesystem::rename(promise(first), promise(second));
+    while (names(updates.back()) != std::vector{second} && !HasFailure())
+        waitForUpdate();
+    std::filesystem::remove(promise(second));
+    while (updates.back()->count() > 0 && !HasFailure())
+        waitForUpdate();
 }
 
 TEST_F(FolderListerTest, ExtraItemsStandAmongTheFolders)

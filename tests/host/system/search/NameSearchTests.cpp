@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "host/system/desktop/MimeTypeRegistry.h"
+#include "host/system/files/ItemPaths.h"
 #include "host/system/search/IndexedNameSearch.h"
 #include "host/system/search/NameIndex.h"
 #include "host/system/texts/NameFolding.h"
@@ -11,6 +12,7 @@
 #include <gmock/gmock.h>
 
 #include <filesystem>
+#include <fstream>
 #include <map>
 
 namespace {
@@ -136,10 +138,13 @@ TEST_F(NameSearchTests, KnowsWhatTheListsShowAndNothingElse)
     folder.write("outside/plan.txt", "");
     folder.write("b/plans/x.txt", "");
     std::filesystem::create_directory_symlink(folder.at("outside"), folder.at("a/plan link"));
+    const auto longPlan = "plan " + std::string(250, 'x');
+    std::ofstream(host::system::promisePath(folder.at("b/" + longPlan)))
+        << R"({"name": ")" + longPlan + R"("})";
     begin({"a", "b", "missing"});
     EXPECT_THAT(search_("plan"),
-        UnorderedElementsAre(
-            "a/Plan.txt", "a/deep/er/Planet.txt", "a/Plan B.pdf*", "a/plan link", "b/plans"));
+        UnorderedElementsAre("a/Plan.txt", "a/deep/er/Planet.txt", "a/Plan B.pdf*", "a/plan link", "b/plans",
+            "b/" + longPlan + "*"));
     EXPECT_TRUE(results.isComplete);
     EXPECT_EQ(results.query, "plan");
     EXPECT_THAT(search_(""), IsEmpty());
