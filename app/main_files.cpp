@@ -98,9 +98,11 @@ const char* reasonName(platform::TrashedItem::Reason reason)
     case platform::TrashedItem::Reason::NotPutBack:
         return "not put back";
     case platform::TrashedItem::Reason::KeptCopy:
+        return "kept copy";
+    case platform::TrashedItem::Reason::ContentWithoutPromise:
         break;
     }
-    return "kept copy";
+    return "content without a promise";
 }
 
 /// Prints what is in the trash: the reason, a tab, the name for `restore` and `drop`, a tab, where it was.

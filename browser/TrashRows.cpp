@@ -30,6 +30,8 @@ std::string shortReason(Reason reason)
         return localized("Could not be put back");
     case Reason::KeptCopy:
         return localized("Kept version");
+    case Reason::ContentWithoutPromise:
+        return localized("Without a name");
     }
     return {};
 }
@@ -45,17 +47,33 @@ std::string sentenceAbout(Reason reason)
     case Reason::KeptCopy:
         return localized(
             "Another program saved a new document in its place while it was being moved to the trash.");
+    case Reason::ContentWithoutPromise:
+        return localized("Its content is in the cloud, but nothing in the drive leads to it any more, so its "
+                         "name is lost. Restore puts it into the folder “%@”.",
+            {localized("Documents")});
     }
     return {};
 }
 
+constexpr const char* linkIcon = "emblem-symbolic-link";
+
+/// Answers the name for the screen. The ending of an alias says nothing to the user.
+std::string shownName(const TrashedItem& item)
+{
+    const std::string_view name = item.name;
+    const auto ending = item.standsForAnother ? screens::nameExtension(name).size() + 1 : 0;
+    return screens::displayName(name.substr(0, name.size() - ending));
+}
+
 std::string iconOf(const TrashedItem& item)
 {
+    if (item.standsForAnother)
+        return linkIcon;
     switch (item.type) {
     case FileType::Directory:
         return "folder";
     case FileType::SymbolicLink:
-        return "emblem-symbolic-link";
+        return linkIcon;
     case FileType::Regular:
     case FileType::Other:
         break;
@@ -108,7 +126,7 @@ TrashContent readTrash()
     TrashContent content{{}, std::move(items.error)};
     std::map<std::string, std::string> places;
     for (auto& item : items.value.value_or(std::vector<TrashedItem>())) {
-        TrashRow row{{}, screens::displayName(item.name), {}};
+        TrashRow row{{}, shownName(item), {}};
         if (!item.origin.empty()) {
             const auto url = Url::fileURL(item.origin);
             // Most items come from a few folders.

@@ -43,6 +43,11 @@ Result<Url> restoreTo(const TrashedItem& item, const Url& target, const FileUtil
     });
 }
 
+bool isNameLost(const TrashedItem& item)
+{
+    return item.reason == TrashedItem::Reason::ContentWithoutPromise;
+}
+
 /// Answers the error of an item that stays as it is.
 Error refusal(FileErrorCode code, const Url& item, std::string sentence)
 {
@@ -114,7 +119,9 @@ Url TrashUtils::placeOf(const TrashedItem& item)
         return Url::fileURL(item.origin);
     // Nobody restores anything while nobody is signed in, and the trash refuses a place outside the drive.
     const auto top = services().cloudDocumentService().containers().defaultContainerURL();
-    return top.value_or(Url::fileURL("/")).appendingPathComponent(item.name);
+    const auto folder = top.value_or(Url::fileURL("/"));
+    return (isNameLost(item) ? folder.appendingPathComponent("Documents") : folder)
+        .appendingPathComponent(item.name);
 }
 
 void TrashUtils::removeOld()
@@ -154,13 +161,15 @@ RestoringOutcome restoreItems(ItemChange& change, const std::vector<TrashedItem>
         const auto& item = *next++;
         auto result = TrashUtils::restore(item, change.stillWanted());
         const bool isTaken = result.error && result.error->is(FileErrorCode::ItemExists);
-        if (isTaken && ifTaken == IfTaken::KeepBoth)
+        // The name of a content without a promise is none that anybody has chosen.
+        const bool keepsBoth = ifTaken == IfTaken::KeepBoth || isNameLost(item);
+        if (isTaken && keepsBoth)
             result = TrashUtils::restoreBeside(item, change.stillWanted());
         else if (isTaken)
             outcome.refused.push_back(item);
         if (result)
             outcome.restored.push_back(*result);
-        return isTaken && ifTaken == IfTaken::Refuse ? std::nullopt : result.error;
+        return isTaken && !keepsBoth ? std::nullopt : result.error;
     });
     return outcome;
 }

@@ -22,12 +22,16 @@ struct TrashedItem {
         Trashed, ///< it was moved there
         NotPutBack, ///< a start found it out of its place and could not put it back
         KeptCopy, ///< another program saved in its place while it was being moved there
+        /// It is a content in the cloud that nothing in the drive stands for any more. Its name is lost, and
+        /// it is restored as a promise, in the folder for documents when no place is given.
+        ContentWithoutPromise,
     };
 
     std::string identifier; ///< its name for the operations of Trash
     std::string name; ///< as bytes; the one that it had in its folder
     FileType type = FileType::Regular;
     bool isPromise = false; ///< its content is in the cloud
+    bool standsForAnother = false; ///< it is an alias or a reference, whose extension is not to be shown
     std::optional<std::uint64_t> size; ///< of a document, in bytes
     std::string origin; ///< the absolute path where it was; empty when that is not known
     std::optional<Date> trashed; ///< when it came into the trash; absent when that is not known

@@ -84,7 +84,8 @@ protected:
     }
     static void pressTool(const kit::ViewController& screen, const std::string& title)
     {
-        for (const auto& item : screen.toolbarItems()) {
+        const auto items = screen.toolbarItems(); // pressing one may change them
+        for (const auto& item : items) {
             if (item->title() == title)
                 item->press();
         }
@@ -264,6 +265,30 @@ TEST_F(TrashTest, WhatIsOldGoesWhenTheDriveIsSetUp)
     ASSERT_EQ(left->size(), 1U);
     EXPECT_EQ(left->front().name, "young.txt");
     EXPECT_EQ(sideButton(), "1 in Trash");
+}
+
+TEST_F(TrashTest, ContentsWithoutAPromiseAndAliasesShowAsWhatTheyAre)
+{
+    for (const auto* content : {"one", "two"})
+        testing_support::writeFile(drive.layout().cloud() + '/' + content, "data");
+    launch();
+    trash({drive.writeAlias("Recipes.trwalias", "BrindleDefault/Documents")});
+    const auto screen = show();
+    ASSERT_NE(screen, nullptr);
+    EXPECT_THAT(names(*screen), ElementsAre("Recipes", "Recovered document", "Recovered document"));
+    const auto alias = screen->listView()->row(rowOf(*screen, "Recipes"));
+    EXPECT_EQ(alias.image->iconName(), "emblem-symbolic-link");
+    EXPECT_THAT(screen->listView()->row(1).detail, testing::StartsWith("Without a name"));
+
+    screen->setSelecting(true);
+    for (const std::size_t row : {1, 2})
+        screen->listView()->activateRow(row);
+    pressTool(*screen, "Restore");
+    wait();
+    EXPECT_EQ(alert(), nullptr) << "both have the same name, and none that anybody has chosen";
+    EXPECT_THAT(names(*screen), ElementsAre("Recipes"));
+    EXPECT_TRUE(isThere("Documents/.Recovered document.trwpromise"));
+    EXPECT_TRUE(isThere("Documents/.Recovered document 2.trwpromise"));
 }
 
 } // namespace

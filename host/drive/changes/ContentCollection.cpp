@@ -231,17 +231,20 @@ SystemResult<Names> ContentCollection::orphans()
 {
     // The contents are listed first: one that is stored later has its promise before it has its name.
     auto contents = namesIn(_layout.cloud());
-    if (!contents)
-        return contents.error;
-    const auto promised = readPromises(_layout);
-    if (!promised)
-        return promised.error;
+    // The second walk is for a promise that was moved while the first one went on.
+    for (int walk = 0; walk < 2 && contents && !contents->empty(); ++walk) {
+        const auto promised = readPromises(_layout);
+        if (!promised)
+            return promised.error;
+        std::erase_if(*contents, [&](const std::string& content) { return promised->names(content); });
+    }
+    if (!contents || contents->empty())
+        return contents;
     // A content that was released meanwhile is gone from the folder.
     const auto now = namesIn(_layout.cloud());
     if (!now)
         return now.error;
-    std::erase_if(*contents,
-        [&](const std::string& content) { return promised->names(content) || !now->contains(content); });
+    std::erase_if(*contents, [&](const std::string& content) { return !now->contains(content); });
     return contents;
 }
 

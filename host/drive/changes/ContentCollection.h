@@ -33,7 +33,9 @@ public:
     system::SystemResult<Outcome> run();
 
     /// Answers the contents that no promise names and that were not released, because no program of ours has
-    /// removed their promises. It reads every promise once. Any thread.
+    /// removed their promises. It reads every promise once, and again when it finds one. A promise that is
+    /// moved about meanwhile may escape it, so what is done with a content must leave it to such a promise.
+    /// Any thread.
     system::SystemResult<std::set<std::string>> orphans();
 
 private:

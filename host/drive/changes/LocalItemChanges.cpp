@@ -39,24 +39,6 @@ namespace {
 /// With it the short form of a promise fits into the inode of its file.
 constexpr const char* contentPrefix = "c-";
 
-PromiseRecord promiseFor(const FileDescriptor& document, const std::string& name, const std::string& content)
-{
-    const auto facts = lookAtOpenFile(document);
-    PromiseRecord promise;
-    promise.size = facts.status.stx_size;
-    promise.modified = facts.modified();
-    promise.created = facts.created();
-    promise.shared = facts.marks.shared;
-    promise.role = facts.marks.role;
-    promise.extensionHidden = facts.marks.extensionHidden;
-    promise.documentIdentifier = facts.marks.documentIdentifier;
-    promise.tags = facts.marks.tags;
-    promise.content = content;
-    if (name.size() > system::longestNameInPromise)
-        promise.longName = name;
-    return promise;
-}
-
 /// These two numbers stand for refusals between the steps below. No system call of those steps fails with
 /// them otherwise.
 constexpr int changedMeanwhile = ECANCELED;

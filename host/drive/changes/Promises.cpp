@@ -4,6 +4,8 @@
 #include "host/drive/changes/Promises.h"
 
 #include "host/drive/changes/CloudStore.h"
+#include "host/drive/records/ItemFacts.h"
+#include "host/system/files/DriveNames.h"
 
 #include <fcntl.h>
 
@@ -40,6 +42,24 @@ SystemResult<OpenPromise> OpenPromise::open(const FileDescriptor& folder, const 
     if (!record)
         return record.error;
     return OpenPromise{std::move(file), std::move(*record)};
+}
+
+PromiseRecord promiseFor(const FileDescriptor& document, const std::string& name, const std::string& content)
+{
+    const auto facts = lookAtOpenFile(document);
+    PromiseRecord promise;
+    promise.size = facts.status.stx_size;
+    promise.modified = facts.modified();
+    promise.created = facts.created();
+    promise.shared = facts.marks.shared;
+    promise.role = facts.marks.role;
+    promise.extensionHidden = facts.marks.extensionHidden;
+    promise.documentIdentifier = facts.marks.documentIdentifier;
+    promise.tags = facts.marks.tags;
+    promise.content = content;
+    if (name.size() > system::longestNameInPromise)
+        promise.longName = name;
+    return promise;
 }
 
 SystemResult<std::string> contentOfPromise(const FileDescriptor& folder, const std::string& promiseName)

@@ -29,6 +29,10 @@ struct OpenPromise {
     }
 };
 
+/// Answers the promise of an open document of this name, whose content gets the name `content`.
+PromiseRecord promiseFor(
+    const system::FileDescriptor& document, const std::string& name, const std::string& content);
+
 /// Answers the name of the content behind a promise file in an open folder. The name is empty when the
 /// promise names none or is damaged. An error means that the file could not be read.
 system::SystemResult<std::string> contentOfPromise(

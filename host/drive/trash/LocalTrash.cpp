@@ -8,7 +8,9 @@
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/ItemFacts.h"
 #include "host/drive/records/SmallFile.h"
+#include "host/drive/trash/TrashedContent.h"
 #include "host/system/files/DirectoryReader.h"
+#include "host/system/files/DriveNames.h"
 #include "host/system/files/ItemPaths.h"
 #include "host/system/files/SystemErrors.h"
 #include "host/system/texts/Translate.h"
@@ -22,6 +24,7 @@
 #include <array>
 #include <cerrno>
 #include <chrono>
+#include <iterator>
 
 namespace host::drive {
 
@@ -67,6 +70,8 @@ bool isContainer(std::string_view relative)
             && relative.substr(slash + 1) == DriveLayout::documentsFolderName);
 }
 
+} // namespace
+
 Error notInTrash()
 {
     platform::PropertyDictionary info;
@@ -74,6 +79,8 @@ Error notInTrash()
         host::system::translated(host::system::textKey("The item is no longer in the trash.")));
     return Error(FileErrorCode::NoSuchItem, std::move(info));
 }
+
+namespace {
 
 Error changeError(const SystemError& failure, const std::string& path)
 {
@@ -157,9 +164,9 @@ Result<std::vector<TrashedItem>> LocalTrash::items()
     static constexpr platform::Operation op{"-[LocalTrash items]"};
     std::vector<TrashedItem> items;
     const auto trash = system::openFolder(_layout.trash());
-    if (!trash && trash.error.is(ENOENT))
-        return items;
-    const auto names = trash ? readNames(*trash) : trash.error;
+    const auto names = trash     ? readNames(*trash)
+        : trash.error.is(ENOENT) ? SystemResult<std::vector<std::string>>(std::vector<std::string>())
+                                 : trash.error;
     if (!names)
         return itemError(names.error, _layout.trash());
     std::vector<std::string> empty;
@@ -180,6 +187,7 @@ Result<std::vector<TrashedItem>> LocalTrash::items()
             empty.push_back(name);
     }
     dropEmptyPlaces(empty);
+    std::ranges::move(contentsWithoutPromise(), std::back_inserter(items));
     std::ranges::sort(items, [](const TrashedItem& a, const TrashedItem& b) {
         return a.trashed != b.trashed ? a.trashed > b.trashed : a.identifier < b.identifier;
     });
@@ -215,6 +223,8 @@ Result<LocalTrash::Found> LocalTrash::find(const std::string& identifier) const
 Result<std::string> LocalTrash::restore(
     const std::string& identifier, const std::optional<std::string>& target)
 {
+    if (const auto content = contentIn(identifier))
+        return restoreContent(*content, target);
     const auto found = find(identifier);
     if (!found)
         return *found.error;
@@ -245,6 +255,8 @@ Result<std::string> LocalTrash::restore(
 
 std::optional<Error> LocalTrash::remove(const std::string& identifier)
 {
+    if (const auto content = contentIn(identifier))
+        return removeContent(*content);
     const auto found = find(identifier);
     if (!found)
         return found.error;
@@ -284,6 +296,9 @@ TrashedItem LocalTrash::describe(
     described.name = item.entry.name;
     described.type = system::fileType(item.found.st_mode);
     described.isPromise = item.isPromise();
+    const auto extension = described.name.substr(described.name.rfind('.') + 1);
+    described.standsForAnother = described.type == platform::FileType::Regular
+        && (extension == system::aliasExtension || extension == system::referenceExtension);
     if (S_ISREG(item.found.st_mode))
         described.size = static_cast<std::uint64_t>(item.found.st_size);
     if (described.isPromise) {

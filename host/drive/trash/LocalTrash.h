@@ -7,7 +7,10 @@
 #include "host/drive/trash/TrashPlace.h"
 #include "platform/Trash.h"
 
+#include <chrono>
 #include <memory>
+#include <mutex>
+#include <set>
 
 namespace host::drive {
 
@@ -17,6 +20,10 @@ namespace host::drive {
 /// Whoever moves something in or out shares a lock of the trash folder, so a place without an item was left
 /// by a process that is gone when the lock can be had alone. Such places are removed by the next listing. An
 /// item without a record is listed with what is known of it.
+///
+/// Contents in the cloud without a promise are listed, too. A search for them reads all promises, so it takes
+/// at most a twentieth of the time. One is restored by making a promise of it, and removed by releasing it
+/// (CloudStore::release()): neither harms a promise that the search has missed.
 class LocalTrash : public platform::Trash {
 public:
     LocalTrash(
@@ -43,6 +50,13 @@ private:
         LocatedItem item;
     };
 
+    std::vector<platform::TrashedItem> contentsWithoutPromise();
+    platform::Result<std::string> restoreContent(
+        const std::string& content, const std::optional<std::string>& target);
+    system::SystemError promiseContent(const DriveEntry& entry, const std::string& content) const;
+    std::optional<platform::Error> removeContent(const std::string& content);
+    void forgetContent(const std::string& content);
+
     platform::Result<Found> find(const std::string& identifier) const;
     system::SystemError take(const LocatedItem& item, const TrashPlace& place);
     void dropEmptyPlaces(const std::vector<std::string>& names) const;
@@ -53,6 +67,9 @@ private:
     DriveLayout _layout;
     std::shared_ptr<LocalItemChanges> _changes;
     std::shared_ptr<CloudStore> _store;
+    std::mutex _mutex; ///< guards the fields below
+    std::set<std::string> _contents; ///< without a promise, as the last search has found them
+    std::chrono::steady_clock::time_point _nextSearch;
 };
 
 } // namespace host::drive

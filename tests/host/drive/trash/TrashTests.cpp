@@ -4,6 +4,7 @@
 #include "host/drive/changes/LocalCloudStore.h"
 #include "host/drive/changes/Recovery.h"
 #include "host/drive/records/ItemFacts.h"
+#include "platform/FileChanges.h"
 #include "tests/support/DriveFixture.h"
 
 #include <sys/file.h>
@@ -355,6 +356,55 @@ TEST_F(TrashTest, ADocumentIsFoundByItsIdentifierAgain)
     const auto file = identifiers.resolve(*identifier);
     ASSERT_TRUE(file);
     EXPECT_EQ(file->place, "documents/BrindleDefault/elsewhere/b.txt");
+}
+
+TEST_F(TrashTest, AContentThatNothingStandsForIsListedAndComesBack)
+{
+    const auto document = writeDocument("a.txt", "text");
+    mark(document, "user.note", "kept");
+    writePromise("named.txt", promiseOf("of a promise"));
+    for (const auto* content : {"of a promise", "second"})
+        writeContent(content);
+    ASSERT_FALSE(services().fileChanges().evictItem(document.path()));
+    fs::remove(PromiseRecord::pathFor(document.path()));
+    const auto all = items();
+    ASSERT_THAT(all, SizeIs(2));
+    for (const auto& item : all) {
+        EXPECT_EQ(item.reason, Reason::ContentWithoutPromise);
+        EXPECT_EQ(item.size, 4U);
+        EXPECT_TRUE(item.isPromise && item.origin.empty());
+    }
+    const auto& dropped = all[0].identifier.ends_with("second") ? all[0] : all[1];
+    const auto& kept = all[0].identifier.ends_with("second") ? all[1] : all[0];
+    writeDocument("taken.txt", "other");
+    EXPECT_TRUE(
+        trash().restore(kept.identifier, url("taken.txt").path()).error->is(FileErrorCode::ItemExists));
+    const auto place = trash().restore(kept.identifier, std::nullopt);
+    EXPECT_EQ(place.value, url("Documents/Recovered document").path());
+    EXPECT_FALSE(trash().remove(dropped.identifier));
+    EXPECT_THAT(items(), IsEmpty());
+    EXPECT_TRUE(trash().remove(dropped.identifier)->is(FileErrorCode::NoSuchItem));
+    EXPECT_TRUE(
+        trash().restore(dropped.identifier, url("gone.txt").path()).error->is(FileErrorCode::NoSuchItem));
+
+    cloud->items().download(Url::fileURL(*place), nullptr);
+    settle();
+    EXPECT_EQ(contentOf(*place), "text");
+    EXPECT_EQ(AttributeReader(*place).value("user.note"), "kept");
+    EXPECT_TRUE(fs::exists(layout().cloud() + "/of a promise"));
+    EXPECT_FALSE(hasTraces());
+}
+
+TEST_F(TrashTest, ARemovedContentStaysWhenAPromiseNamesItAfterAll)
+{
+    writeContent("one");
+    const auto all = items();
+    ASSERT_THAT(all, SizeIs(1));
+    writePromise("back.txt", promiseOf("one"));
+    EXPECT_FALSE(trash().remove(all[0].identifier));
+    cloud->items().download(url("back.txt"), nullptr);
+    settle();
+    EXPECT_EQ(contentOf(url("back.txt")), "data");
 }
 
 } // namespace
