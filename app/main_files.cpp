@@ -10,7 +10,9 @@
 #include "items/DocumentID.h"
 #include "items/FileUtils.h"
 #include "items/TrashUtils.h"
+#include "platform/DocumentContainers.h"
 #include "platform/FileChanges.h"
+#include "platform/FileCoordinator.h"
 #include "platform/FileSystem.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Trash.h"
@@ -31,6 +33,9 @@ using host::drive::LocalCloudDocumentService;
 using platform::Url;
 using tarrow::FileUtils;
 using tarrow::TrashUtils;
+
+constexpr std::string_view removingLibrary = "remove-library";
+constexpr std::size_t mostBytes = 64UL * 1024 * 1024; ///< of a document that is saved or added
 
 std::shared_ptr<LocalCloudDocumentService> installDrive(const std::shared_ptr<platform::Dispatch>& dispatch)
 {
@@ -127,13 +132,34 @@ int fetch(const Url& url, host::system::GLibDispatch& dispatch)
 /// Replaces the content of one document by that of another.
 int save(const Url& url, const Url& from)
 {
-    constexpr std::size_t mostBytes = 64UL * 1024 * 1024;
     auto& files = platform::services().fileChanges();
     const auto content = files.contentToReplace(from.path(), mostBytes);
     const auto before = files.contentToReplace(url.path(), mostBytes);
     if (!content || !before)
         return report(content ? before.error : content.error);
     return report(files.replaceContent(url.path(), *before, *content->bytes).error);
+}
+
+/// Makes a document with the content, the tags and the access of another one.
+int add(const Url& url, const Url& like)
+{
+    auto& files = platform::services().fileChanges();
+    const auto content = files.contentToReplace(like.path(), mostBytes);
+    return report(content ? files.addDocument(url.path(), like.path(), *content->bytes) : content.error);
+}
+
+/// Deletes the documents of an app library, whose description stays.
+int removeLibrary(const Url& documents)
+{
+    auto& containers = platform::services().cloudDocumentService().containers();
+    const auto library = containers.containerForItem(documents);
+    if (!library)
+        return report(library.error);
+    std::optional<platform::Error> failed;
+    const auto refused = platform::services().fileCoordinator().coordinateWriting(documents,
+        platform::WritingOptions::ForDeleting,
+        [&](const Url&) { failed = containers.deleteContents(**library); });
+    return report(refused ? refused : failed);
 }
 
 /// Gives an item tags in place of its own.
@@ -197,6 +223,10 @@ int run(std::string_view command, const std::vector<Url>& urls, host::system::GL
         return report(FileUtils::moveTo(urls[0], urls[1]));
     if (command == "save" && urls.size() == 2)
         return save(urls[0], urls[1]);
+    if (command == "add" && urls.size() == 2)
+        return add(urls[0], urls[1]);
+    if (command == removingLibrary && urls.size() == 1)
+        return removeLibrary(urls[0]);
     if (command == "tag" && !urls.empty())
         return tag(urls[0], {urls.begin() + 1, urls.end()});
     if (command == "fetch" && urls.size() == 1)
@@ -204,7 +234,7 @@ int run(std::string_view command, const std::vector<Url>& urls, host::system::GL
     if (command == "list" && urls.size() == 1)
         return list(urls[0]);
     if (command == "evict" && urls.size() == 1)
-        return FileUtils::evictDocument(urls[0]) ? 0 : 1;
+        return report(FileUtils::evict(urls[0]));
     if (command == "docid" && urls.size() == 1)
         return printIdentifier(urls[0]);
     return urls.size() == 1 ? runInTrash(command, urls[0].lastPathComponent()) : 2;
@@ -219,10 +249,12 @@ int main(int argc, char** argv)
     // The queues are destroyed last, because the services may still post work to them while they are
     // destroyed.
     const auto dispatch = std::make_shared<host::system::GLibDispatch>();
-    const auto top = installDrive(dispatch)->layout().defaultContainer();
+    const auto layout = installDrive(dispatch)->layout();
+    const auto top = layout.defaultContainer();
     std::vector<Url> urls;
     for (std::size_t i = 2; i < arguments.size(); ++i)
-        urls.push_back(Url::fileURL(top + '/' + arguments[i]));
+        urls.push_back(Url::fileURL(arguments[1] == removingLibrary ? layout.containerDocuments(arguments[i])
+                                                                    : top + '/' + arguments[i]));
     if (arguments.size() == 2 && arguments[1] == "list")
         urls.push_back(Url::fileURL(top));
     const bool resolves = arguments.size() == 3 && arguments[1] == "resolve";
@@ -233,7 +265,8 @@ int main(int argc, char** argv)
     if (status == 2)
         std::fputs(
             "usage: tarrow-files list [PATH] | mkdir|remove|evict|fetch|docid|trash PATH | move FROM TO | "
-            "save PATH FROM | tag PATH [TAG...] | resolve ID | trashed | restore|drop NAME\n",
+            "save|add PATH FROM | tag PATH [TAG...] | resolve ID | trashed | restore|drop NAME | "
+            "remove-library NAME\n",
             stderr);
     platform::installServices({});
     return status;

@@ -22,16 +22,29 @@ platform::FileChanges& changes()
     return services().fileChanges();
 }
 
-std::optional<Date> modificationDate(const Url& url)
+/// Answers the date of an item's content, or why it cannot be told.
+Result<Date> modificationDate(const Url& url)
 {
-    const auto value = FileUtils::getResourceValueForURL(AttributeKey::ContentModificationDate, url);
-    const auto* date = value ? std::get_if<Date>(&*value) : nullptr;
-    return date ? std::optional(*date) : std::nullopt;
+    constexpr AttributeKey keys[] = {AttributeKey::ContentModificationDate};
+    const auto values =
+        services().cloudDocumentService().promisedItems().promisedItemResourceValues(url, keys);
+    const auto value =
+        values ? std::optional(values->value(keys[0])) : FileUtils::getResourceValueForURL(keys[0], url);
+    if (const auto* date = value ? std::get_if<Date>(&*value) : nullptr)
+        return *date;
+    return values.error.value_or(Error(FileErrorCode::Cancelled));
+}
+
+/// Answers the error of an item that is kept, with the sentence of the reason if there is one.
+Error kept(const Result<Date>& date)
+{
+    auto info = date.error ? date.error->userInfo() : platform::PropertyDictionary();
+    return Error(FileErrorCode::Cancelled, std::move(info));
 }
 
 /// The state of an item when its deletion was requested.
 struct KnownState {
-    std::optional<Date> date;
+    Result<Date> date;
     std::optional<platform::ItemVersion> version;
 };
 
@@ -46,8 +59,8 @@ std::optional<Error> removeUnchanged(const Url& location, const KnownState& befo
 {
     static constexpr Operation op{"+[FileUtils remove:]"};
     const auto date = modificationDate(location);
-    std::optional<Error> error = Error(FileErrorCode::Cancelled);
-    if (date && date == before.date)
+    std::optional<Error> error = kept(before.date ? date : before.date);
+    if (date && before.date && *date == *before.date)
         error = changes().removeItem(location.path(), before.version);
     if (!error)
         op.info("Deleted item: '%@'", location);

@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "tests/sweep/support/SweepFixture.h"
+#include "tests/sweep/support/Tally.h"
 
 #include <gmock/gmock.h>
 
@@ -134,6 +135,7 @@ TEST_P(HardFaults, ASecondFaultWhileTheFirstIsTakenBackLosesNothing)
                     + (then.isKill ? "; killed" : "; EIO") + " at call " + std::to_string(second));
                 expectWhole(runWithTwo(first.index, fault, second, then));
                 ++pairs;
+                ++sweep_tests::tally().pairs;
             }
         }
     };

@@ -6,6 +6,7 @@
 #include "host/drive/changes/LocalItemChanges.h"
 #include "host/drive/records/PromiseFile.h"
 #include "tests/sweep/support/SweepFixture.h"
+#include "tests/sweep/support/Tally.h"
 
 #include <cstdlib>
 #include <filesystem>
@@ -88,8 +89,10 @@ protected:
             });
             ended = ending.calls;
             startAgain();
-            if (isDone)
+            if (isDone) {
+                ++sweep_tests::tally().deeds;
                 check(met);
+            }
         }
     }
     /// Answers the promises whose content is nowhere.

@@ -5,6 +5,7 @@
 #include "host/drive/changes/Recovery.h"
 #include "tests/sweep/support/DiskImage.h"
 #include "tests/sweep/support/SweepFixture.h"
+#include "tests/sweep/support/Tally.h"
 
 #include <gmock/gmock.h>
 
@@ -151,6 +152,7 @@ TEST_P(PowerCut, LosesNothingAtAnyMoment)
             unmount();
             removeCopy(moment);
             ++images;
+            ++sweep_tests::tally().powerCuts;
         }
     }
     RecordProperty("images", images);

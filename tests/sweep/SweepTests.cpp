@@ -1,7 +1,9 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
+#include "tests/sweep/support/Reasons.h"
 #include "tests/sweep/support/SweepFixture.h"
+#include "tests/sweep/support/Tally.h"
 
 #include <gmock/gmock.h>
 
@@ -9,6 +11,8 @@
 
 #include <cerrno>
 #include <cstring>
+#include <set>
+#include <sstream>
 
 namespace {
 
@@ -25,7 +29,7 @@ TEST_P(Sweep, AKillAtAnyCallLosesNothingAndTheNextStartPutsItRight)
     const auto whole = run();
     ASSERT_EQ(whole.status, 0);
     const auto after = seen();
-    ASSERT_NE(before, after);
+    ASSERT_FALSE(before == after);
     ASSERT_THAT(leftovers(), testing::IsEmpty());
     ASSERT_GE(whole.calls, 10);
     RecordProperty("calls", whole.calls);
@@ -40,6 +44,7 @@ TEST_P(Sweep, AKillAtAnyCallLosesNothingAndTheNextStartPutsItRight)
             return;
         }
         ASSERT_TRUE(ending.wasKilled);
+        ++sweep_tests::tally().kills;
         EXPECT_TRUE(isNothingHalf(seen(), before));
         EXPECT_TRUE(isAllThere(isRemoval() ? after : before));
         startAgain();
@@ -57,12 +62,14 @@ TEST_P(Sweep, AFailureOfAnyCallLeavesAllAsItWasOrAllDone)
     const auto after = seen();
     for (const int error : {ENOSPC, EIO, EACCES}) {
         SCOPED_TRACE(::strerrorname_np(error));
-        const auto fail = [&](const FileCall& call) {
-            const bool isPossible =
-                (error != ENOSPC || call.mayNeedSpace()) && (error != EACCES || call.takesPath());
-            return isPossible ? Fault{error} : Fault{};
+        const auto isPossible = [&](const FileCall& call) {
+            return (error != ENOSPC || call.mayNeedSpace()) && (error != EACCES || call.takesPath());
         };
-        atEachCall(fail, [&](const FileCall& met, const Ending& ending) {
+        const auto fail = [&](const FileCall&) { return Fault{error}; };
+        const auto check = [&](const FileCall& met, const Ending& ending) {
+            if (met.index != 0)
+                ++sweep_tests::tally().errors;
+            EXPECT_EQ(ending.status == 0 ? "" : sweep_tests::faultOfReason(ending, error), "");
             const auto now = noticed();
             // Once a change is made, only syncing it to the disk can still fail.
             EXPECT_TRUE((now == before && ending.status != 0)
@@ -72,9 +79,43 @@ TEST_P(Sweep, AFailureOfAnyCallLeavesAllAsItWasOrAllDone)
                 startAgain();
             EXPECT_THAT(leftovers(), testing::IsEmpty());
             EXPECT_TRUE(noticed() == now) << differences(noticed(), now);
-        });
+        };
+        atEachCall(fail, check, isPossible, Turns::Some);
     }
 }
+
+class ListingSweep : public sweep_tests::SweepFixture { };
+
+TEST_P(ListingSweep, AFailureOfAnyCallIsSaidUnlessTheListIsWhole)
+{
+    makeDrive();
+    const auto listed = [](const std::string& said) {
+        std::set<std::string> lines;
+        std::istringstream all(said);
+        for (std::string line; std::getline(all, line);) {
+            if (line.find('\t') != std::string::npos)
+                lines.insert(line);
+        }
+        return lines;
+    };
+    const auto whole = listed(run().said);
+    ASSERT_GE(whole.size(), 10U);
+    const auto fail = [](const FileCall&) { return Fault{EIO}; };
+    atEachCall(
+        fail,
+        [&](const FileCall& met, const Ending& ending) {
+            sweep_tests::tally().errors += met.index != 0;
+            if (ending.status == 0)
+                EXPECT_EQ(listed(ending.said), whole);
+            else
+                EXPECT_EQ(sweep_tests::faultOfReason(ending, EIO), "");
+        },
+        // A promise whose name is too long for its file is still left out when that name cannot be read.
+        [](const FileCall& call) { return call.subject.find("/long") == std::string::npos; });
+}
+
+INSTANTIATE_TEST_SUITE_P(Operations, ListingSweep, testing::Values(sweep_tests::Operation{"list", {"list"}}),
+    testing::PrintToStringParamName());
 
 INSTANTIATE_TEST_SUITE_P(
     Operations, Sweep, testing::ValuesIn(sweep_tests::operations()), testing::PrintToStringParamName());

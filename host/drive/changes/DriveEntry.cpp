@@ -155,11 +155,11 @@ SystemResult<FileDescriptor> openOwnFolder(const std::string& path)
     FileDescriptor folder(::open(path.c_str(), flags));
     if (!folder && errno == ENOENT) {
         if (::mkdir(path.c_str(), S_IRWXU) != 0 && errno != EEXIST)
-            return SystemError::last(path);
+            return SystemError::last(path).ofDrive();
         folder = FileDescriptor(::open(path.c_str(), flags));
     }
     if (!folder)
-        return SystemError::last(path);
+        return SystemError::last(path).ofDrive();
     return folder;
 }
 

@@ -75,7 +75,8 @@ host::system::SystemResult<struct stat> statusAt(
 /// that either.
 host::system::SystemError renameEntry(const host::system::FileDescriptor& from, const std::string& name,
     const host::system::FileDescriptor& to, const std::string& newName);
-/// Opens one of the drive's private folders, and makes it when it is missing. Only the user may enter it.
+/// Opens one of the drive's private folders, and makes it when it is missing. Only the user may enter it. Its
+/// errors are of the drive and not of an item (SystemError::ofDrive()).
 host::system::SystemResult<host::system::FileDescriptor> openOwnFolder(const std::string& path);
 /// Answers whether a name has a meaning of its own in the drive, so that an item with it would not be seen:
 /// the private names of work that is under way, and those of promises.

@@ -91,8 +91,11 @@ std::optional<Error> makeFolder(
     if (!failure)
         failure = SystemError::unless(::mkdirat(entry->folder.get(), entry->name.c_str(), 0777) == 0, path);
     if (failure.is(EEXIST)) {
-        if (const auto found = entry->status(); found && S_ISDIR(found->st_mode))
+        const auto found = entry->status();
+        if (found && S_ISDIR(found->st_mode))
             return std::nullopt;
+        if (!found && !found.error.is(ENOENT))
+            return itemError(found.error, path);
     }
     if (!failure) {
         made.push_back(std::move(*entry.value));

@@ -130,15 +130,15 @@ SystemResult<WorkRecord> WorkRecord::write(const DriveLayout& layout, const Plac
     bool hasName = false;
     fresh._file = makeFile(path, hasName);
     if (!fresh._file)
-        return isFull() ? SystemResult<WorkRecord>(std::move(fresh)) : SystemError::last(path);
+        return isFull() ? SystemResult<WorkRecord>(std::move(fresh)) : SystemError::last(path).ofDrive();
     if (hasName)
         fresh._path = path;
     if (!lockWhole(fresh._file, F_OFD_SETLKW))
-        return SystemError::last(path);
+        return SystemError::last(path).ofDrive();
     if (!writeText(fresh._file, textOf(places)) && !isFull())
-        return SystemError::last(path);
+        return SystemError::last(path).ofDrive();
     if (!hasName && !giveName(fresh._file, path) && !isFull())
-        return SystemError::last(path);
+        return SystemError::last(path).ofDrive();
     fresh._path = path;
     return fresh;
 }

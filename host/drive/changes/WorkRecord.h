@@ -46,7 +46,7 @@ public:
     static constexpr const char* temporaryPrefix = ".trwtmp-";
 
     /// Writes a record. A full disk is no error, because items must be removable then; the record is empty in
-    /// that case.
+    /// that case. Errors are of the drive and not of the item (SystemError::ofDrive()).
     static system::SystemResult<WorkRecord> write(const DriveLayout& layout, const Places& places);
     /// Calls `settle` for every record whose process has ended. When it answers true the record is removed;
     /// otherwise the record stays for another time.

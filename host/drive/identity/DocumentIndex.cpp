@@ -5,6 +5,7 @@
 
 #include <sqlite3.h>
 
+#include <cerrno>
 #include <random>
 #include <span>
 
@@ -45,6 +46,13 @@ DocumentIndex::State DocumentIndex::prepareForWriting()
 {
     const std::lock_guard lock(_mutex);
     return _database.prepareFor(Use::Writing);
+}
+
+system::SystemError DocumentIndex::failure() const
+{
+    const std::lock_guard lock(_mutex);
+    const auto& failure = _database.failure();
+    return (failure ? failure : system::SystemError(EBUSY)).ofDrive();
 }
 
 DocumentIndex::Answer DocumentIndex::lookUp(std::uint32_t identifier, Use use) const

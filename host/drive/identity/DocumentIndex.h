@@ -58,6 +58,9 @@ public:
     /// usable one.
     State prepareForWriting();
 
+    /// Answers why the index could not be used or written last, as an error of the drive's own files.
+    system::SystemError failure() const;
+
     /// Notes the place of a document, and creates the index when there is none. Answers whether it was noted.
     /// A removed document stays removed.
     bool note(std::uint32_t identifier, const DocumentPlace& place);

@@ -64,10 +64,10 @@ SystemError IdentifiedItem::carry(std::uint32_t identifier) const
 {
     TRW_TRY(writeIdentifier(_file, identifier));
     // The file may have been replaced by another one, such as a new version or the downloaded document.
+    // A look that fails does not take the identifier back.
     struct stat now;
-    if (::fstat(_file.get(), &now) != 0)
-        return SystemError::last(_path);
-    return now.st_nlink == 0 ? SystemError(ESTALE, _path) : SystemError();
+    const bool isReplaced = ::fstat(_file.get(), &now) == 0 && now.st_nlink == 0;
+    return isReplaced ? SystemError(ESTALE, _path) : SystemError();
 }
 
 Result<platform::DocumentIdentifiers::OpenFile::Attributes> IdentifiedItem::attributes() const

@@ -8,6 +8,8 @@
 #include <sqlite3.h>
 #include <unistd.h>
 
+#include <cerrno>
+
 namespace host::drive {
 
 namespace {
@@ -96,6 +98,8 @@ IndexDatabase::State IndexDatabase::prepareFor(Use use)
         discard();
         _state = open(use);
     }
+    if (_state == State::Complete)
+        _failure = {};
     return _state;
 }
 
@@ -108,6 +112,7 @@ IndexDatabase::State IndexDatabase::open(Use use)
         _path.c_str(), &opened, SQLITE_OPEN_READWRITE | SQLITE_OPEN_NOFOLLOW | create, nullptr);
     _database.reset(opened);
     if (failure != SQLITE_OK) {
+        noteFailure(failure);
         close();
         return failure == SQLITE_CANTOPEN && ::access(_path.c_str(), F_OK) != 0 ? State::Missing
                                                                                 : State::Unavailable;
@@ -174,7 +179,33 @@ int IndexDatabase::changes() const
 
 bool IndexDatabase::run(const char* text)
 {
-    return sqlite3_exec(_database.get(), text, nullptr, nullptr, nullptr) == SQLITE_OK;
+    const int code = sqlite3_exec(_database.get(), text, nullptr, nullptr, nullptr);
+    if (code != SQLITE_OK)
+        noteFailure(code);
+    return code == SQLITE_OK;
+}
+
+void IndexDatabase::noteFailure(int code)
+{
+    const int number = _database ? sqlite3_system_errno(_database.get()) : 0;
+    switch (code & 0xff) {
+    case SQLITE_BUSY:
+    case SQLITE_LOCKED:
+        _failure = system::SystemError(EBUSY, _path);
+        break;
+    case SQLITE_FULL:
+        _failure = system::SystemError(ENOSPC, _path);
+        break;
+    case SQLITE_READONLY: // the library opens what may not be written for reading, and keeps no number
+        _failure = system::SystemError(::access(_path.c_str(), W_OK) == 0 ? EACCES : errno, _path);
+        break;
+    case SQLITE_IOERR:
+    case SQLITE_CANTOPEN: // the library may have looked for a missing file since, so ENOENT tells nothing
+        _failure = system::SystemError(number != 0 ? number : ENOENT, _path);
+        break;
+    default: // such as the end of a transaction that never began
+        break;
+    }
 }
 
 IndexDatabase::State IndexDatabase::judge(int code)
@@ -189,6 +220,7 @@ IndexDatabase::State IndexDatabase::judge(int code)
     const bool isDamaged = primary == SQLITE_CORRUPT || primary == SQLITE_NOTADB || primary == SQLITE_ERROR
         || primary == SQLITE_FORMAT || primary == SQLITE_MISMATCH || code == SQLITE_IOERR_SHORT_READ;
     _state = isDamaged ? State::Damaged : State::Unavailable;
+    noteFailure(code);
     op.error("Cannot use the index %@: %@", _path, std::string(sqlite3_errstr(code)));
     return _state;
 }

@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "host/system/files/SystemError.h"
+
 #include <cstdint>
 #include <map>
 #include <memory>
@@ -72,6 +74,10 @@ public:
     /// Runs statements without parameters and answers whether they succeeded.
     bool run(const char* text);
 
+    /// Answers why the database could not be used or changed last; none once it is complete and usable.
+    /// Another process that keeps it locked is EBUSY.
+    const system::SystemError& failure() const { return _failure; }
+
     /// Answers the database's state after a query ended with a code. Damage is logged.
     State judge(int code);
 
@@ -86,12 +92,14 @@ private:
     State makeTables();
     void close();
     void discard();
+    void noteFailure(int code);
 
     std::string _path;
     std::unique_ptr<sqlite3, Close> _database;
     std::map<const char*, std::unique_ptr<sqlite3_stmt, Finalize>>
         _statements; // destroyed before the database
     State _state = State::Missing;
+    system::SystemError _failure;
 };
 
 } // namespace host::drive

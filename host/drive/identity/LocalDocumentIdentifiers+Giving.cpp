@@ -69,11 +69,11 @@ Result<std::uint32_t> LocalDocumentIdentifiers::identifyLocked(const std::string
     if (_index.prepareForWriting() == DocumentIndex::State::Incomplete)
         rebuild();
     if (_index.prepareForWriting() != DocumentIndex::State::Complete)
-        return itemError(EAGAIN, path);
+        return itemError(_index.failure(), path);
     const auto identifier = item->identifier();
     const auto answer = _index.lookUp(identifier, IndexDatabase::Use::Writing);
     if (answer.kind == Kind::Unreadable)
-        return itemError(EAGAIN, path);
+        return itemError(_index.failure(), path);
     if (identifier != 0 && isOwner({identifier, answer.place}, answer.kind, item->place()))
         return identifier;
     return giveIdentifier(*item);
@@ -105,7 +105,7 @@ Result<std::uint32_t> LocalDocumentIdentifiers::giveIdentifier(const IdentifiedI
     // The index is written before the item, so that a crash in between only wastes an identifier.
     const auto identifier = _index.reserve(place);
     if (!identifier)
-        return itemError(EAGAIN, place.path);
+        return itemError(_index.failure(), place.path);
     if (const auto failure = item.carry(*identifier)) {
         _index.release(*identifier);
         return itemError(failure, place.path);

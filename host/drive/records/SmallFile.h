@@ -4,7 +4,7 @@
 #pragma once
 
 #include "host/system/files/FileDescriptor.h"
-#include "host/system/files/SystemError.h"
+#include "host/system/files/SystemErrors.h"
 #include "platform/CloudItems.h"
 #include "platform/Error.h"
 
@@ -27,7 +27,8 @@ platform::Result<std::string> readSmallFile(
 platform::Error itemError(int errorNumber, const std::string& path);
 inline platform::Error itemError(const host::system::SystemError& failure, const std::string& path)
 {
-    return itemError(failure.number(), path);
+    return failure.concernsDrive() ? host::system::systemError(failure, path)
+                                   : itemError(failure.number(), path);
 }
 
 /// The codes of errorDomain::cloud.

@@ -180,7 +180,9 @@ std::string ItemAttributes::localizedName(const Url& url, const ItemFacts& facts
         if (_containers->isContainerTopFolder(url)) {
             if (const auto container = _containers->containerForItem(url))
                 return (*container)->localizedName;
-            return displayable(*_containers->containerIdentifierInURL(url));
+            // A folder whose name is no identifier has no container, so it shows its own name.
+            if (auto identifier = _containers->containerIdentifierInURL(url))
+                return displayable(std::move(*identifier));
         }
         const auto& top = _defaultContainer.path();
         const std::string_view below =

@@ -111,7 +111,8 @@ Url LocalPromisedItems::physicalURLForPromise(const Url& url) const
 
 bool LocalPromisedItems::isItemPromise(const Url& url) const
 {
-    return PromiseRecord::itemPathFor(url.path()) && existsOnDisk(url.path()).value_or(false);
+    // A promise that cannot be looked at stands for its item all the same.
+    return PromiseRecord::itemPathFor(url.path()) && existsOnDisk(url.path()).value_or(true);
 }
 
 Url LocalPromisedItems::logicalURLForPromise(const Url& url) const

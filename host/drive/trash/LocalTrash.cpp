@@ -51,13 +51,13 @@ SystemResult<FileDescriptor> openTrash(const DriveLayout& layout, int lock)
         return made.error;
     auto folder = system::openFolder(layout.trash());
     if (!folder)
-        return folder;
+        return folder.error.ofDrive();
     int result = 0;
     do
         result = ::flock(folder->get(), lock);
     while (result != 0 && errno == EINTR);
     if (result != 0)
-        return SystemError::last(layout.trash());
+        return SystemError::last(layout.trash()).ofDrive();
     return folder;
 }
 

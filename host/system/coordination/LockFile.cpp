@@ -103,13 +103,17 @@ SystemResult<FileDescriptor> LockFile::acquire(
     Bytes bytes;
     for (const auto& claim : claims)
         addPath(bytes, claim);
-    constexpr int flags = O_RDWR | O_CREAT | O_CLOEXEC | O_NOCTTY;
+    // The path of a file without a name is a link that the kernel makes.
+    const int flags = O_RDWR | O_CREAT | O_CLOEXEC | O_NOCTTY | (_unnamed ? 0 : O_NOFOLLOW);
     FileDescriptor file(::open(_path.c_str(), flags, S_IRUSR | S_IWUSR));
     if (!file)
-        return SystemError::last(_path);
+        return SystemError::last(_path).ofDrive();
     Pauses pauses(patience);
-    for (const auto& [byte, mode] : bytes)
-        TRW_TRY(lockByte(file, byte, mode, pauses));
+    for (const auto& [byte, mode] : bytes) {
+        auto failure = lockByte(file, byte, mode, pauses);
+        if (failure)
+            return failure.is(EBUSY) ? failure : failure.ofDrive();
+    }
     return file;
 }
 

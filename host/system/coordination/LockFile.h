@@ -36,8 +36,9 @@ public:
     explicit LockFile(std::string path);
 
     /// Waits until all claims can be locked, but no longer than `patience` in all. Answers the open file that
-    /// holds the locks until it is closed. Errors: EBUSY when another holder kept them all that time, EROFS
-    /// or EACCES when the file cannot be written.
+    /// holds the locks until it is closed. Errors: EBUSY when another holder kept them all that time; all
+    /// others are of the drive and not of an item (SystemError::ofDrive()), such as EROFS or EACCES when the
+    /// file cannot be written.
     SystemResult<FileDescriptor> acquire(const std::vector<Claim>& claims, platform::Duration patience) const;
 
 private:

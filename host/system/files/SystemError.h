@@ -44,14 +44,26 @@ public:
 
     /// Answers whether something failed.
     explicit operator bool() const { return _number != 0; }
-    bool is(int number) const { return _number == number; }
+    /// Answers whether the item that the caller named met this error. A failure of the drive's own files says
+    /// nothing about the item.
+    bool is(int number) const { return _number == number && !_concernsDrive; }
     /// Answers the errno, or 0 when nothing failed.
     int number() const { return _number; }
+    /// Answers the same error as one of a file that the drive needs for its work, such as a record, and not
+    /// of the item that is worked on.
+    SystemError ofDrive() const
+    {
+        auto error = *this;
+        error._concernsDrive = true;
+        return error;
+    }
+    bool concernsDrive() const { return _concernsDrive; }
     /// Answers the name that the call was about; empty when that is the item that the caller named.
     const std::string& about() const { return _about; }
 
 private:
     int _number = 0;
+    bool _concernsDrive = false;
     std::string _about;
 };
 

@@ -64,6 +64,39 @@ std::string sentence(int errorNumber)
     return translated(found != std::end(sentences) ? found->key : textKey("“%@” can’t be used."));
 }
 
+/// Answers the sentence for an error of a file that the drive needs for its work on an item. What is said of
+/// the storage and of what the program has open holds for the item, too.
+std::string sentenceOfDrive(int errorNumber)
+{
+    switch (errorNumber) {
+    case EACCES:
+    case EPERM:
+        return translated(
+            textKey("You don’t have permission to use the drive’s own files, which are needed for “%@”."));
+    case ENOENT:
+    case EEXIST:
+    case ENOTEMPTY:
+    case ENAMETOOLONG:
+    case EILSEQ:
+    case EINVAL:
+    case ENOTDIR:
+    case EISDIR:
+    case ELOOP:
+    case EXDEV:
+    case ENXIO:
+    case ENODEV:
+    case ESPIPE:
+    case EBADMSG:
+        return translated(textKey("The drive’s own files, which are needed for “%@”, can’t be used."));
+    case EBUSY:
+    case EAGAIN:
+        return translated(
+            textKey("The drive’s own files, which are needed for “%@”, are being used by another program."));
+    default:
+        return sentence(errorNumber);
+    }
+}
+
 std::optional<FileErrorCode> fileErrorCode(int errorNumber)
 {
     switch (errorNumber) {
@@ -103,6 +136,18 @@ Error systemError(int errorNumber, std::string_view path, const std::optional<st
     if (const auto code = fileErrorCode(errorNumber))
         return Error(*code, std::move(info));
     return Error(platform::errorDomain::system, errorNumber, std::move(info));
+}
+
+Error systemError(
+    const SystemError& failure, std::string_view path, const std::optional<std::string>& destination)
+{
+    if (!failure.concernsDrive())
+        return systemError(failure.number(), path, destination);
+    platform::PropertyDictionary info;
+    info.emplace(platform::errorKey::filePath, std::string(path));
+    info.emplace(platform::errorKey::localizedDescription,
+        platform::formatText(sentenceOfDrive(failure.number()), {displayName(path)}));
+    return Error(platform::errorDomain::system, failure.number(), std::move(info));
 }
 
 std::string logText(const SystemError& failure)

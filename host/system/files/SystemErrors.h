@@ -18,11 +18,10 @@ namespace host::system {
 /// is one, and a sentence for the user that names the item.
 platform::Error systemError(
     int errorNumber, std::string_view path, const std::optional<std::string>& destination = std::nullopt);
-inline platform::Error systemError(const SystemError& failure, std::string_view path,
-    const std::optional<std::string>& destination = std::nullopt)
-{
-    return systemError(failure.number(), path, destination);
-}
+/// Answers the same for an error value. One of the drive's own files is never an error of the file domain,
+/// and its sentence does not say that the item is missing, taken or forbidden.
+platform::Error systemError(const SystemError& failure, std::string_view path,
+    const std::optional<std::string>& destination = std::nullopt);
 
 /// Answers an error as a text for the log: the name of its errno and the name that it is about.
 std::string logText(const SystemError& failure);

@@ -12,6 +12,7 @@
 #include <poll.h>
 #include <sched.h>
 #include <sys/ioctl.h>
+#include <sys/mman.h>
 #include <sys/prctl.h>
 #include <sys/syscall.h>
 #include <sys/uio.h>
@@ -33,13 +34,15 @@ using host::system::FileDescriptor;
 constexpr int namedInFolder[] = {SYS_openat, SYS_openat2, SYS_newfstatat, SYS_statx, SYS_readlinkat,
     SYS_faccessat2, SYS_renameat, SYS_renameat2, SYS_unlinkat, SYS_mkdirat, SYS_symlinkat, SYS_linkat,
     SYS_utimensat};
-constexpr int namedByPath[] = {SYS_lsetxattr,
+constexpr int namedByPath[] = {SYS_setxattr, SYS_lsetxattr, SYS_getxattr, SYS_lgetxattr, SYS_listxattr,
+    SYS_llistxattr, SYS_removexattr, SYS_lremovexattr,
 #ifdef __x86_64__
-    SYS_mkdir, SYS_rename, SYS_unlink, SYS_rmdir
+    SYS_mkdir, SYS_rename, SYS_unlink, SYS_rmdir, SYS_readlink
 #endif
 };
-constexpr int ofOpenFile[] = {SYS_fsetxattr, SYS_flistxattr, SYS_fgetxattr, SYS_fchmod, SYS_ftruncate,
-    SYS_fstat, SYS_read, SYS_pread64, SYS_write, SYS_fsync, SYS_fdatasync, SYS_lseek, SYS_getdents64};
+constexpr int ofOpenFile[] = {SYS_fsetxattr, SYS_flistxattr, SYS_fgetxattr, SYS_fremovexattr, SYS_fchmod,
+    SYS_ftruncate, SYS_fallocate, SYS_fstat, SYS_read, SYS_pread64, SYS_write, SYS_pwrite64, SYS_fsync,
+    SYS_fdatasync, SYS_lseek, SYS_getdents64};
 constexpr int changingNames[] = {SYS_renameat, SYS_renameat2, SYS_unlinkat,
 #ifdef __x86_64__
     SYS_rename, SYS_unlink, SYS_rmdir
@@ -48,8 +51,9 @@ constexpr int changingNames[] = {SYS_renameat, SYS_renameat2, SYS_unlinkat,
 constexpr int transferring[] = {SYS_read, SYS_pread64, SYS_write};
 constexpr int opening[] = {SYS_openat, SYS_openat2};
 constexpr std::span<const int> watched[] = {namedInFolder, namedByPath, ofOpenFile};
-constexpr int needingSpace[] = {SYS_renameat, SYS_renameat2, SYS_mkdirat, SYS_symlinkat, SYS_linkat,
-    SYS_lsetxattr, SYS_fsetxattr, SYS_ftruncate, SYS_write, SYS_fsync, SYS_fdatasync,
+constexpr int needingSpace[] = {
+    SYS_renameat, SYS_renameat2, SYS_mkdirat, SYS_symlinkat, SYS_linkat, SYS_setxattr, SYS_lsetxattr,
+    SYS_fsetxattr, SYS_ftruncate, SYS_fallocate, SYS_write, SYS_pwrite64, SYS_fsync, SYS_fdatasync,
 #ifdef __x86_64__
     SYS_mkdir, SYS_rename
 #endif
@@ -166,6 +170,15 @@ void answer(int listener, pid_t process, const seccomp_notif& notice, const Faul
     ::ioctl(listener, SECCOMP_IOCTL_NOTIF_SEND, &response);
 }
 
+/// Answers what was written into a file in memory.
+std::string wholeText(const FileDescriptor& file)
+{
+    std::string text(static_cast<std::size_t>(std::max<off_t>(::lseek(file.get(), 0, SEEK_END), 0)), '\0');
+    const auto length = ::pread(file.get(), text.data(), text.size(), 0);
+    text.resize(static_cast<std::size_t>(std::max<ssize_t>(length, 0)));
+    return text;
+}
+
 Ending supervise(pid_t process, int listener, const std::string& folder, const FaultFor& faultFor)
 {
     Ending ending;
@@ -195,7 +208,7 @@ Ending supervise(pid_t process, int listener, const std::string& folder, const F
 
 /// Runs in the child, which shares its open files with this process until it becomes the program: puts the
 /// listener in the place of an open file.
-[[noreturn]] void becomeProgram(const std::vector<std::string>& command, int quiet, int listenersPlace)
+[[noreturn]] void becomeProgram(const std::vector<std::string>& command, int said, int listenersPlace)
 {
     std::vector<char*> arguments;
     for (const auto& argument : command)
@@ -204,8 +217,8 @@ Ending supervise(pid_t process, int listener, const std::string& folder, const F
     const int listener = installFilter();
     if (::dup3(listener, listenersPlace, O_CLOEXEC) >= 0 && ::close(listener) == 0
         && ::unshare(CLONE_FILES) == 0) {
-        ::dup2(quiet, STDERR_FILENO);
-        ::dup2(quiet, STDOUT_FILENO);
+        ::dup2(said, STDERR_FILENO);
+        ::dup2(said, STDOUT_FILENO);
         ::execv(arguments[0], arguments.data());
     }
     ::_exit(127);
@@ -241,16 +254,18 @@ bool FileCall::isTransfer() const
 Ending runWithFaults(
     const std::vector<std::string>& command, const std::string& watchedFolder, const FaultFor& faultFor)
 {
-    const FileDescriptor quiet(::open("/dev/null", O_WRONLY | O_CLOEXEC));
+    const FileDescriptor said(::memfd_create("said", MFD_CLOEXEC));
     const FileDescriptor listener(::open("/dev/null", O_WRONLY | O_CLOEXEC));
     // This process goes on when the child has become the program, and not before.
     const auto process =
         static_cast<pid_t>(::syscall(SYS_clone, CLONE_FILES | CLONE_VFORK | SIGCHLD, 0, 0, 0, 0));
     if (process == 0)
-        becomeProgram(command, quiet.get(), listener.get());
+        becomeProgram(command, said.get(), listener.get());
     if (::waitpid(process, nullptr, WNOHANG) != 0)
         throw std::runtime_error("system calls cannot be filtered here");
-    return supervise(process, listener.get(), watchedFolder, faultFor);
+    auto ending = supervise(process, listener.get(), watchedFolder, faultFor);
+    ending.said = wholeText(said);
+    return ending;
 }
 
 } // namespace sweep_tests

@@ -38,6 +38,7 @@ struct Ending {
     bool wasKilled = false;
     int status = -1; ///< exit status, when it was not killed
     int calls = 0; ///< calls below the watched folder
+    std::string said; ///< what it printed, with its log
 };
 
 /// Runs a program and asks before each of its calls on files below a folder for a fault. A filter of system

@@ -6,6 +6,7 @@
 #include "host/drive/changes/ContentCollection.h"
 #include "host/drive/changes/LocalCloudStore.h"
 #include "host/drive/changes/Recovery.h"
+#include "host/drive/records/ItemMarks.h"
 #include "host/drive/records/PromiseFile.h"
 #include "host/drive/trash/LocalTrash.h"
 #include "host/system/files/DriveNames.h"
@@ -14,6 +15,7 @@
 
 #include <algorithm>
 #include <cerrno>
+#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <ostream>
@@ -29,8 +31,10 @@ using host::drive::TrashRecord;
 
 /// The name in the trash of a folder that was moved there.
 constexpr const char* trashedFolder = ".trwtrash-1";
-/// What stands in the picture of a drive for a promise's tag.
-constexpr const char* tagged = "tagged";
+/// An app library, and what lies in its folder.
+constexpr const char* library = "BrindleLetters";
+/// What stands in the picture of a drive for a tag or an identifier.
+constexpr const char* marked = "marked";
 
 /// Names that are too long for the suffix of a promise.
 const std::string longDocument = "long/" + std::string(250, 'd'),
@@ -62,7 +66,9 @@ std::vector<Operation> operations()
         {"tagPromise", {"tag", "inner/p.txt", "Red", "Blue"}}, {"evictLong", {"evict", longDocument}},
         {"fetchLong", {"fetch", longPromise}}, {"renameLong", {"move", longPromise, longDocument + "x"}},
         {"shortenLong", {"move", longPromise, "inner/new.txt"}},
-        {"lengthenPromise", {"move", "inner/p.txt", longDocument + "x"}}};
+        {"lengthenPromise", {"move", "inner/p.txt", longDocument + "x"}},
+        {"docid", {"docid", "inner/file.txt"}}, {"docidPromise", {"docid", "inner/p.txt"}},
+        {"add", {"add", "target/new.txt", "inner/file.txt"}}, {"removeLibrary", {"remove-library", library}}};
 }
 
 void SweepFixture::makeDrive() const
@@ -84,6 +90,9 @@ void SweepFixture::makeDrive() const
     promise(longPromise, "llll");
     promise("gone/q.pdf", "qqq");
     write(at("gone/q.txt"), "text");
+    fs::create_directories(fs::path(libraryDocument()).parent_path());
+    write(libraryDocument(), "letter");
+    promise(fs::relative(fs::path(libraryDocument()).parent_path() / "l.pdf", at("")), "lll");
     fs::create_directories(_layout.trash() + '/' + trashedFolder);
     const auto place = _layout.trash() + '/' + trashedFolder;
     write(place + '/' + TrashRecord::fileName, TrashRecord{"BrindleDefault/inner/gone", {1}}.text());
@@ -101,11 +110,21 @@ Ending SweepFixture::run(const FaultFor& faultFor) const
 }
 
 void SweepFixture::atEachCall(const FaultFor& faultFor,
-    const std::function<void(const FileCall& met, const Ending& ending)>& check) const
+    const std::function<void(const FileCall& met, const Ending& ending)>& check, const IsPossible& isPossible,
+    Turns turns) const
 {
     makeDrive();
-    const int calls = run().calls;
-    for (int point = 1; point <= calls; ++point) {
+    std::vector<int> points;
+    run([&](const FileCall& call) {
+        if (isPossible(call))
+            points.push_back(call.index);
+        return Fault{};
+    });
+    constexpr std::size_t some = 80;
+    const bool isShort = turns == Turns::Some && !::getenv("TARROW_LONG_SWEEP");
+    const auto step = isShort ? 1 + points.size() / some : 1;
+    for (std::size_t turn = 0; turn < points.size(); turn += step) {
+        const int point = points[turn];
         makeDrive();
         FileCall met;
         const auto ending = run([&](const FileCall& call) {
@@ -136,7 +155,7 @@ void SweepFixture::startAgain() const
 bool SweepFixture::isRemoval() const
 {
     const auto& command = GetParam().arguments[0];
-    return command == "remove" || command == "save" || command == "drop";
+    return command.starts_with("remove") || command == "save" || command == "drop";
 }
 
 Drive SweepFixture::seen() const
@@ -159,16 +178,26 @@ void SweepFixture::addItems(Drive& drive, const std::string& folder, const std::
         if (const auto item = PromiseRecord::itemPathFor(path)) {
             const auto promised = prefix.empty() ? *item : prefix + item->substr(folder.size() + 1);
             drive["promise of " + promised] = behind(path);
-            for (const auto& tag : host::drive::readPromise(path).value.value_or(PromiseRecord()).tags)
-                drive["tag " + tag + " of " + promised] = tagged;
+            const auto record = host::drive::readPromise(path).value.value_or(PromiseRecord());
+            for (const auto& tag : record.tags)
+                drive["tag " + tag + " of " + promised] = marked;
+            if (record.documentIdentifier != 0)
+                drive["identifier of " + promised] = marked;
         } else if (each->path().filename().string().starts_with(".trw")) {
             each.disable_recursion_pending();
         } else {
             drive[shown] = each->is_symlink() ? "link to " + fs::read_symlink(path).string()
                 : each->is_directory()        ? "folder"
                                               : read(path);
+            if (host::drive::documentIdentifierAt(path) != 0)
+                drive["identifier of " + shown] = marked;
         }
     }
+}
+
+std::string SweepFixture::libraryDocument() const
+{
+    return _layout.containerDocuments(library) + "/letter.txt";
 }
 
 std::vector<std::string> SweepFixture::trashPlaces() const
@@ -244,7 +273,7 @@ bool SweepFixture::isAllThere(const Drive& drive) const
             contents.push_back(read(entry.path().string()));
     }
     return std::ranges::all_of(drive, [&](const auto& item) {
-        return item.second == "folder" || item.second == tagged || item.second.starts_with("link to ")
+        return item.second == "folder" || item.second == marked || item.second.starts_with("link to ")
             || std::ranges::find(contents, item.second) != contents.end();
     });
 }
@@ -252,7 +281,7 @@ bool SweepFixture::isAllThere(const Drive& drive) const
 bool SweepFixture::isNothingHalf(const Drive& now, const Drive& before)
 {
     return std::ranges::all_of(now, [&](const auto& item) {
-        return item.second == "folder" || item.second == "nothing" || item.second == tagged
+        return item.second == "folder" || item.second == "nothing" || item.second == marked
             || std::ranges::any_of(before, [&](const auto& old) { return old.second == item.second; });
     });
 }

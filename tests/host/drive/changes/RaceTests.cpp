@@ -9,6 +9,8 @@
 #include <fcntl.h>
 
 #include <atomic>
+#include <cstdio>
+#include <cstdlib>
 #include <set>
 #include <thread>
 
@@ -87,6 +89,13 @@ private:
     std::thread _thread;
 };
 
+/// The long run takes so many rounds in each test.
+int roundsOf(int few)
+{
+    constexpr int many = 50'000;
+    return ::getenv("TARROW_LONG_SWEEP") ? many : few;
+}
+
 class RaceTest : public testing::Test, public testing_support::DriveFixture {
 protected:
     /// Checks that every saved version exists somewhere, was replaced by its saver, or is one of these.
@@ -107,7 +116,7 @@ protected:
 
 TEST_F(RaceTest, NoVersionIsDeletedThatTheDeleterHadNotSeen)
 {
-    constexpr int rounds = 200;
+    const int rounds = roundsOf(200);
     const auto item = url("a.txt");
     writeDocument(".a.txt.trwpromise", R"({"content": "other"})");
     Saver saver(item.path(), folder().at("temporary"));
@@ -135,12 +144,13 @@ TEST_F(RaceTest, NoVersionIsDeletedThatTheDeleterHadNotSeen)
     }
     saver.stop();
     expectNoneLost(saver, deleted);
+    std::printf("Tried: %d races\n", rounds);
     EXPECT_GT(saver.saved, rounds / 2);
 }
 
 TEST_F(RaceTest, NoVersionIsReplacedThatWasNotRead)
 {
-    constexpr int rounds = 300;
+    const int rounds = roundsOf(300);
     const auto item = url("a.txt");
     Saver saver(item.path(), folder().at("temporary"));
     saver.start();
@@ -159,6 +169,7 @@ TEST_F(RaceTest, NoVersionIsReplacedThatWasNotRead)
     EXPECT_THAT(contentOf(item.path()), testing::AnyOf(std::to_string(saver.saved), "0"))
         << "the newest version has the name";
     expectNoneLost(saver, accounted);
+    std::printf("Tried: %d races\n", rounds);
     EXPECT_GT(replaced, 0);
     EXPECT_GT(saver.saved, 1);
 }

@@ -6,6 +6,7 @@
 #include "tests/support/DriveFixture.h"
 
 #include <sqlite3.h>
+#include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -265,6 +266,12 @@ protected:
     {
         return LocalDocumentIdentifiers::create(_drive.layout(), _drive.dispatch);
     }
+    /// Answers what a user is told when a new document cannot be identified.
+    std::string reasonAgainst(LocalDocumentIdentifiers& identifiers)
+    {
+        const auto result = identifiers.identify(document("new.txt"));
+        return result ? "none" : result.error->text(platform::errorKey::localizedDescription).value_or("");
+    }
 
     std::uint32_t _identifier = 0;
     Url _place = Url::fileURL("/");
@@ -327,10 +334,24 @@ TEST_F(DamagedIndexTests, lockedByAnotherProcess)
         SQLITE_OK);
     const auto identifiers = begin();
     EXPECT_EQ(::find(*identifiers, _identifier), _place);
-    EXPECT_TRUE(identifiers->identify(document("new.txt")).error) << "nobody can tell which numbers are free";
+    EXPECT_EQ(reasonAgainst(*identifiers),
+        "The drive’s own files, which are needed for “new.txt”, are being used by another program.");
     sqlite3_close(other);
     EXPECT_TRUE(identifiers->identify(document("new.txt")));
     EXPECT_EQ(::find(*identifiers, _identifier), _place);
+}
+
+TEST_F(DamagedIndexTests, replacedBySomethingElse)
+{
+    for (const bool isPipe : {true, false}) {
+        fs::remove_all(_drive.layout().index());
+        if (isPipe)
+            ASSERT_EQ(::mkfifo(_drive.layout().index().c_str(), 0600), 0);
+        else
+            fs::create_directory(_drive.layout().index());
+        EXPECT_EQ(
+            reasonAgainst(*begin()), "The drive’s own files, which are needed for “new.txt”, can’t be used.");
+    }
 }
 
 TEST_F(DocumentIdentifierTests, processesThatIdentifyOneCopyAgree)

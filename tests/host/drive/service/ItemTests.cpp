@@ -142,6 +142,10 @@ TEST_F(ItemTests, namesAreKeptAsBytesAndShownAsText)
     EXPECT_EQ(text(broken, AttributeKey::Name), "caf\xe9.txt");
     EXPECT_EQ(text(broken, AttributeKey::LocalizedName), "caf\xef\xbf\xbd.txt");
     EXPECT_EQ(text(_drive.url("Desktop"), AttributeKey::LocalizedName), "Desktop");
+    const auto hidden = _drive.layout().containerDocuments(".x");
+    std::filesystem::create_directories(hidden);
+    EXPECT_EQ(text(Url::fileURL(hidden), AttributeKey::LocalizedName), "Documents")
+        << "no library has this name";
 }
 
 TEST_F(ItemTests, missingItemsAndOtherFailures)

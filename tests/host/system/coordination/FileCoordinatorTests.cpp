@@ -91,6 +91,21 @@ TEST_F(FileCoordinatorTest, writersOfThreadsAndProcessesHaveTheirItemToThemselve
     EXPECT_EQ(numberInFile(), 4 * 3 * rounds);
 }
 
+TEST_F(FileCoordinatorTest, anUnusableLockFileIsNoFaultOfTheItem)
+{
+    const auto item = makeFile("a.txt");
+    std::filesystem::create_directories(_folder.at("locks/all"));
+    std::filesystem::create_symlink(_folder.at("locks/all"), _folder.at("locks/link"));
+    for (const auto& place : {"locks/all", "locks/link"}) {
+        LocalFileCoordinator coordinator({.lockFile = _folder.at(place)});
+        const auto error =
+            coordinator.coordinateWriting(item, WritingOptions::None, [](const Url&) { FAIL(); });
+        ASSERT_TRUE(error);
+        EXPECT_EQ(error->text(errorKey::localizedDescription),
+            "The drive’s own files, which are needed for “a.txt”, can’t be used.");
+    }
+}
+
 TEST_F(FileCoordinatorTest, anAccessorMayCoordinateAgainForItemsThatItsThreadHolds)
 {
     LocalFileCoordinator coordinator(settings());
