@@ -54,11 +54,18 @@ void request(GtkWidget* widget, const char* action, GVariant*)
     (*rowOf(widget)->handler)(widget, isMenu ? Request::Menu : Request::Peek);
 }
 
+void removeParts(TrwListRow* row)
+{
+    while (GtkWidget* child = gtk_widget_get_first_child(GTK_WIDGET(row)))
+        gtk_widget_unparent(child);
+    std::ranges::fill(row->parts, nullptr);
+    row->title = row->detail = nullptr;
+    row->isFilled = false;
+}
+
 void dispose(GObject* object)
 {
-    auto* widget = GTK_WIDGET(object);
-    while (GtkWidget* child = gtk_widget_get_first_child(widget))
-        gtk_widget_unparent(child);
+    removeParts(rowOf(object));
     G_OBJECT_CLASS(trw_list_row_parent_class)->dispose(object);
 }
 
@@ -292,6 +299,24 @@ void show(GtkWidget* widget, const kit::ListRow& content, double height)
     showStyle(row, content);
     showAccessible(row, content);
     row->isFilled = true;
+}
+
+void announce(GtkWidget* widget, const kit::ListRow& content, double height)
+{
+    auto* row = rowOf(widget);
+    reserve(widget, height);
+    if (row->isFilled)
+        removeParts(row);
+    else if (*row->shown == content)
+        return;
+    *row->shown = content;
+    showStyle(row, content);
+    showAccessible(row, content);
+}
+
+bool isShown(GtkWidget* row)
+{
+    return rowOf(row)->isFilled;
 }
 
 const kit::ListRow& shown(GtkWidget* row)

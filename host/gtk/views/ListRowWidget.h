@@ -25,6 +25,11 @@ bool isRow(GtkWidget* widget);
 void reserve(GtkWidget* row, double height);
 /// Shows a row. It is cheap when the widget shows the row already.
 void show(GtkWidget* widget, const kit::ListRow& content, double height);
+/// Makes the widget take the room of a row and names it for assistive technology, without the parts that a
+/// person would see.
+void announce(GtkWidget* widget, const kit::ListRow& content, double height);
+/// Answers whether the widget has these parts.
+bool isShown(GtkWidget* row);
 const kit::ListRow& shown(GtkWidget* row);
 guint position(GtkWidget* row);
 /// Answers whether a point of the row, in its own coordinates, lies on the check mark or before it.

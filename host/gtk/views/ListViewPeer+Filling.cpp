@@ -1,7 +1,9 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// This file fills row widgets: visible rows at once, the others a few in each frame.
+// This file fills row widgets: visible rows at once, those beside them a few in each frame. The rows further
+// away have no parts, because a list keeps 205 rows, and all of them may have to go in one turn when items
+// are deleted.
 
 #include "host/gtk/views/ListRowWidget.h"
 #include "host/gtk/views/ListViewPeer.h"
@@ -18,10 +20,19 @@ constexpr std::size_t rowsInAFrame = 6;
 /// empty row.
 constexpr std::size_t seenMargin = 2;
 
-bool isSeen(const kit::ListView& list, std::size_t row)
+/// Rows that are so near to the visible ones get their parts, and rows that are further away than the second
+/// number lose them.
+constexpr std::size_t nearMargin = 20, farMargin = 50;
+
+bool isWithin(const kit::ListView& list, std::size_t row, std::size_t margin)
 {
     const auto visible = list.visibleRows();
-    return row + seenMargin >= visible.first && row < visible.end() + seenMargin;
+    return row + margin >= visible.first && row < visible.end() + margin;
+}
+
+bool isSeen(const kit::ListView& list, std::size_t row)
+{
+    return isWithin(list, row, seenMargin);
 }
 
 } // namespace
@@ -31,8 +42,32 @@ void ListViewPeer::bindRow(GtkListItem* item)
     const auto list = _list.lock();
     const guint position = gtk_list_item_get_position(item);
     _unfilled.erase(item);
-    if (list && position < list->rowCount())
-        ListRowWidget::show(gtk_list_item_get_child(item), list->row(position), list->rowHeight());
+    if (!list || position >= list->rowCount())
+        return;
+    auto* row = gtk_list_item_get_child(item);
+    const auto margin = ListRowWidget::isShown(row) ? farMargin : nearMargin;
+    const auto fill = isWithin(*list, position, margin) ? ListRowWidget::show : ListRowWidget::announce;
+    fill(row, list->row(position), list->rowHeight());
+}
+
+void ListViewPeer::fillAfterScrolling()
+{
+    noteMisfits();
+    fillSeenRows();
+    if (!_unfilled.empty())
+        fillLater();
+}
+
+/// Notes the rows that have come near without parts, and those that have gone far with theirs.
+void ListViewPeer::noteMisfits()
+{
+    const auto list = _list.lock();
+    for (auto* item : _live) {
+        const bool isShown = ListRowWidget::isShown(gtk_list_item_get_child(item));
+        const auto margin = isShown ? farMargin : nearMargin;
+        if (list && isWithin(*list, gtk_list_item_get_position(item), margin) != isShown)
+            _unfilled.insert(item);
+    }
 }
 
 void ListViewPeer::fillSoon(GtkListItem* item)
@@ -63,6 +98,7 @@ void ListViewPeer::fillLater()
 
 void ListViewPeer::fillRows()
 {
+    noteMisfits();
     fillSeenRows();
     auto others = unfilledBesideSeen();
     const bool areMore = others.size() > rowsInAFrame;

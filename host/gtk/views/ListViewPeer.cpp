@@ -152,6 +152,7 @@ void ListViewPeer::connectInput()
     auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
     _onScroll = connectSignal<void()>(adjustment, "value-changed", [this] { scrolled(); });
     connect(connectSignal<void()>(adjustment, "changed", [this] {
+        fillLater();
         // This runs in the next frame, because the list is being laid out now.
         context().scheduler().scheduleNextFrame(&_onScroll, [this] { followFingerEvenIfAllIsSeen(); });
     }));
@@ -229,7 +230,7 @@ void ListViewPeer::scrolled()
     const double top = list->contentInsets().top;
     auto* adjustment = gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(_window));
     list->userScrolled({0, gtk_adjustment_get_value(adjustment) - top});
-    fillSeenRows();
+    fillAfterScrolling();
 }
 
 void ListViewPeer::showMenuOf(GtkWidget* row, double x, double y)
@@ -383,6 +384,7 @@ void ListViewPeer::moveTo(double value, int frames)
     if (!list || value <= 0 || isKnown || frames == 0) {
         const SignalBlock block(_onScroll);
         gtk_adjustment_set_value(adjustment, value);
+        fillLater();
         return;
     }
     // The widgets have no height and no place for rows that they have not laid out yet, so the move takes a

@@ -74,6 +74,8 @@ private:
     void fillLater();
     void fillRows();
     void fillSeenRows();
+    void fillAfterScrolling();
+    void noteMisfits();
     std::vector<GtkListItem*> unfilledBesideSeen() const;
     void showMenuOf(GtkWidget* row, double x, double y);
     void showMenuOfList(double x, double y);

@@ -224,11 +224,19 @@ protected:
     {
         return dynamic_cast<host::gtk::ListViewPeer&>(*peerOf(*list));
     }
+    bool isWithin(GtkWidget* row, std::size_t margin) const
+    {
+        const std::size_t position = host::gtk::ListRowWidget::position(row);
+        const auto visible = list->visibleRows();
+        return position + margin >= visible.first && position < visible.end() + margin;
+    }
+    /// Answers whether the widget shows its row. Far from the seen rows it has only the row's name.
     bool matches(GtkWidget* row) const
     {
         const auto wanted = list->row(host::gtk::ListRowWidget::position(row));
+        const bool isNamed = !host::gtk::ListRowWidget::isShown(row) && !isWithin(row, 20);
         return host::gtk::ListRowWidget::shown(row) == wanted
-            && host::gtk::ListRowWidget::titleText(row) == wanted.title;
+            && (isNamed || host::gtk::ListRowWidget::titleText(row) == wanted.title);
     }
     /// Checks that every visible row widget shows the model's row at its place, and soon all existing ones
     /// do.
@@ -308,6 +316,22 @@ TEST_F(ListTests, ManyChangesElsewhereKeepThePlaceAndTheFocus)
     std::erase(after, 2504U);
     change(after);
     waitFor([&] { return focusedId() == 2505; }, "the focus to come to the row behind");
+}
+
+TEST_F(ListTests, RowsFarFromTheSeenOnesHaveNoParts)
+{
+    showRows(1000);
+    expectRowsMatch();
+    for (const std::size_t first : {300U, 450U}) {
+        list->scrollToRow(first, kit::RowPosition::Top, false);
+        settle();
+        expectRowsMatch();
+        const auto isFit = [this](GtkWidget* row) {
+            return isWithin(row, 50) || gtk_widget_get_first_child(row) == nullptr;
+        };
+        waitFor([&] { return std::ranges::all_of(listPeer().liveRows(), isFit); }, "far rows to be emptied");
+        EXPECT_GT(listPeer().liveRows().size(), 150U);
+    }
 }
 
 TEST_F(ListTests, AHundredThousandRowsCostWhatIsNearTheVisibleOnes)
