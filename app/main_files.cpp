@@ -166,6 +166,7 @@ int removeLibrary(const Url& documents)
 int tag(const Url& url, const std::vector<Url>& tags)
 {
     std::vector<std::string> names;
+    names.reserve(tags.size());
     for (const auto& each : tags)
         names.push_back(each.lastPathComponent());
     const auto before = FileUtils::setTags(url, names);

@@ -187,6 +187,7 @@ std::vector<Error> removeItemsForGood(ItemChange& change, const std::vector<Tras
 std::vector<Url> placesOf(const std::vector<TrashedItem>& items)
 {
     std::vector<Url> places;
+    places.reserve(items.size());
     for (const auto& item : items)
         places.push_back(TrashUtils::placeOf(item));
     return places;

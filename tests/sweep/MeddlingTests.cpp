@@ -17,6 +17,7 @@ namespace {
 namespace fs = std::filesystem;
 
 using sweep_tests::Drive;
+using sweep_tests::Ending;
 using sweep_tests::Fault;
 using sweep_tests::FileCall;
 
@@ -86,7 +87,7 @@ protected:
             isDone = deed();
             return Fault{};
         };
-        atEachCall(perform, [&](const FileCall& met, const auto&) {
+        atEachCall(perform, [&](const FileCall& met, const Ending&) {
             startAgain();
             if (std::exchange(isDone, false)) {
                 ++sweep_tests::tally().deeds;

@@ -84,20 +84,22 @@ TEST_P(Sweep, AFailureOfAnyCallLeavesAllAsItWasOrAllDone)
     }
 }
 
+std::set<std::string> listed(const std::string& said)
+{
+    std::set<std::string> lines;
+    std::istringstream all(said);
+    for (std::string line; std::getline(all, line);) {
+        if (line.find('\t') != std::string::npos)
+            lines.insert(line);
+    }
+    return lines;
+}
+
 class ListingSweep : public sweep_tests::SweepFixture { };
 
 TEST_P(ListingSweep, AFailureOfAnyCallIsSaidUnlessTheListIsWhole)
 {
     makeDrive();
-    const auto listed = [](const std::string& said) {
-        std::set<std::string> lines;
-        std::istringstream all(said);
-        for (std::string line; std::getline(all, line);) {
-            if (line.find('\t') != std::string::npos)
-                lines.insert(line);
-        }
-        return lines;
-    };
     const auto whole = listed(run().said);
     ASSERT_GE(whole.size(), 10U);
     const auto fail = [](const FileCall&) { return Fault{EIO}; };

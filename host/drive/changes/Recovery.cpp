@@ -31,7 +31,6 @@ namespace host::drive {
 using host::system::FileDescriptor;
 using host::system::lastName;
 using host::system::SystemError;
-using host::system::SystemResult;
 
 namespace {
 
@@ -297,10 +296,10 @@ bool Recovery::moveToTrash(const DriveEntry& held, const std::string& item)
     static constexpr platform::Operation op{"-[Recovery moveToTrash:]"};
     constexpr int mostOfOneName = 1000;
     const auto trash = openOwnFolder(_layout.trash());
-    const auto path = descriptorPath(held.folder) + '/' + held.name;
-    const auto document = documentPath(item, path);
+    const auto heldPath = descriptorPath(held.folder) + '/' + held.name;
+    const auto document = documentPath(item, heldPath);
     const bool isPromise = document != item;
-    ::lsetxattr(path.c_str(), itemMark::origin, document.data(), document.size(), 0);
+    ::lsetxattr(heldPath.c_str(), itemMark::origin, document.data(), document.size(), 0);
     auto failure = trash ? SystemError(EEXIST) : trash.error;
     for (int number = 1; failure.is(EEXIST) && number < mostOfOneName; ++number) {
         const auto name = numberedName(std::string(lastName(document)), number);

@@ -15,7 +15,6 @@
 
 namespace host::drive {
 
-using host::system::FileDescriptor;
 using host::system::SystemError;
 using host::system::SystemResult;
 using platform::Result;

@@ -15,7 +15,6 @@ namespace {
 
 using nlohmann::json;
 using platform::Date;
-using platform::SharedItemRole;
 
 std::optional<std::uint64_t> plausibleSize(std::int64_t size)
 {
@@ -191,7 +190,7 @@ std::optional<PromiseRecord> PromiseRecord::parseShortForm(std::string_view form
         return std::nullopt;
     PromiseRecord promise;
     promise.kind = static_cast<Kind>(form[1]);
-    const int flags = form[2];
+    const int flags = static_cast<unsigned char>(form[2]);
     const auto number = [&](std::size_t index) { return numberAt(form, 3 + 8 * index); };
     if (flags & hasSize)
         promise.size = plausibleSize(static_cast<std::int64_t>(number(0)));

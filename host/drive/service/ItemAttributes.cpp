@@ -161,7 +161,7 @@ platform::ThumbnailContent ItemAttributes::thumbnailContent(const Url& url, cons
     const std::pair<std::string_view, ThumbnailContent> contents[] = {
         {types::image, ThumbnailContent::Picture}, {types::pdf, ThumbnailContent::Pages},
         {types::movie, ThumbnailContent::Film}};
-    const auto found = std::ranges::find_if(
+    const auto* const found = std::ranges::find_if(
         contents, [&](const auto& content) { return _types->conformsTo(type, content.first); });
     return found == std::end(contents) ? ThumbnailContent::None : found->second;
 }

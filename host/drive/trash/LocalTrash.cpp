@@ -95,7 +95,7 @@ SystemResult<std::string> markedOrigin(const DriveLayout& layout, const LocatedI
     const auto length = ::lgetxattr(path.c_str(), itemMark::origin, text.data(), text.size());
     if (length < 0 && errno != ENODATA && errno != EOPNOTSUPP && errno != ERANGE)
         return SystemError::last(item.name);
-    std::string origin(text.data(), static_cast<std::size_t>(std::max<ssize_t>(length, 0)));
+    const std::string origin(text.data(), static_cast<std::size_t>(std::max<ssize_t>(length, 0)));
     if (!origin.starts_with(layout.documents() + '/'))
         return std::string();
     return PromiseRecord::itemPathFor(origin).value_or(origin);
@@ -146,7 +146,7 @@ Result<TrashedItem> LocalTrash::moveToTrash(
 SystemError LocalTrash::take(const LocatedItem& item, const TrashPlace& place)
 {
     const auto target = place.entry(item.name);
-    const auto failure = LocalItemChanges::moveWithin(item, target, item.name);
+    auto failure = LocalItemChanges::moveWithin(item, target, item.name);
     if (failure.is(EXDEV))
         return _changes->moveAcross(item, target, item.name);
     if (failure)

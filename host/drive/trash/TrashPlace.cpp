@@ -27,8 +27,8 @@ SystemResult<LocatedItem> locateIn(
     if (!found)
         return found.error;
     // Something may have the name of a promise and be none.
-    auto promised = system::promisedName(folder, nameOnDisk);
-    auto name = promised ? std::move(*promised) : nameOnDisk;
+    const auto promised = system::promisedName(folder, nameOnDisk);
+    auto name = promised ? *promised : nameOnDisk;
     FileDescriptor own(::fcntl(folder.get(), F_DUPFD_CLOEXEC, 0));
     if (!own)
         return SystemError::last(nameOnDisk);

@@ -87,7 +87,8 @@ std::string textAt(pid_t process, std::uint64_t address)
     std::array<char, 4096> text{};
     // The text is read up to the end of the page, because the next page may not exist.
     const auto length = std::min<std::uint64_t>(text.size() - 1, 4096 - address % 4096);
-    iovec here{text.data(), length}, there{reinterpret_cast<void*>(address), length};
+    const iovec here{text.data(), length};
+    const iovec there{reinterpret_cast<void*>(address), length};
     if (::process_vm_readv(process, &here, 1, &there, 1, 0) < 0)
         return {};
     return text.data();

@@ -21,7 +21,6 @@ namespace fs = std::filesystem;
 
 using namespace host::drive;
 using namespace platform;
-using host::system::FileDescriptor;
 using host::system::promisedName;
 using testing::ElementsAre;
 using testing::IsEmpty;
