@@ -11,6 +11,7 @@
 #include <filesystem>
 #include <functional>
 #include <utility>
+#include <vector>
 
 namespace {
 
@@ -38,15 +39,17 @@ protected:
     std::string target() const { return at(GetParam().arguments.back()); }
 
     /// Saves as editors do: into a file beside the document, which then replaces it. Answers whether it
-    /// could.
+    /// could. The file has a short name, because a longer one than the document's may be too long.
     static bool save(const std::string& path, const std::string& content = saved)
     {
-        if (!fs::exists(fs::path(path).parent_path()))
+        const auto folder = fs::path(path).parent_path();
+        if (!fs::exists(folder))
             return false;
-        write(path + '~', content);
+        const auto beside = (folder / "saving~").string();
+        write(beside, content);
         std::error_code error;
-        fs::rename(path + '~', path, error);
-        return true;
+        fs::rename(beside, path, error);
+        return !error;
     }
     /// Moves a folder aside and puts a link to a place outside the drive in its place.
     bool swap(const std::string& path) const
@@ -82,16 +85,17 @@ protected:
     /// Performs the deed before each call in turn and checks afterwards, unless the deed was impossible.
     void meddle(const std::function<bool()>& deed, const std::function<void(const FileCall&)>& check) const
     {
-        bool isDone = false;
-        const auto perform = [&](const FileCall&) {
-            isDone = deed();
+        std::vector<FileCall> done;
+        const auto perform = [&](const FileCall& call) {
+            if (deed())
+                done.push_back(call);
             return Fault{};
         };
-        atEachCall(perform, [&](const FileCall& met, const Ending&) {
+        atEachCall(perform, [&](const FileCall&, const Ending&) {
             startAgain();
-            if (std::exchange(isDone, false)) {
+            for (const auto& call : std::exchange(done, {})) {
                 ++sweep_tests::tally().deeds;
-                check(met);
+                check(call);
             }
         });
     }

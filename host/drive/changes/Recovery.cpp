@@ -46,11 +46,11 @@ DriveEntry renamed(const DriveEntry& entry, const char* prefix)
         prefix + entry.name.substr(entry.name.find('-') + 1), entry.path};
 }
 
-/// Answers the path of the document for which a promise belongs at a path; the promise may lie at another one
-/// for the moment. Any other path stands for itself.
-std::string documentPath(const std::string& path, const std::string& promise)
+/// Answers the path of the document for which a promise belongs at a path; the promise may lie in another
+/// place for the moment. Any other path stands for itself.
+std::string documentPath(const std::string& path, const std::string& place)
 {
-    auto name = system::promisedName(promise, lastName(path));
+    auto name = system::promisedName(place, lastName(path));
     return name ? system::siblingPath(path, *name) : PromiseRecord::itemPathFor(path).value_or(path);
 }
 
@@ -296,10 +296,10 @@ bool Recovery::moveToTrash(const DriveEntry& held, const std::string& item)
     static constexpr platform::Operation op{"-[Recovery moveToTrash:]"};
     constexpr int mostOfOneName = 1000;
     const auto trash = openOwnFolder(_layout.trash());
-    const auto heldPath = descriptorPath(held.folder) + '/' + held.name;
-    const auto document = documentPath(item, heldPath);
+    const auto place = descriptorPath(held.folder) + '/' + held.name;
+    const auto document = documentPath(item, place);
     const bool isPromise = document != item;
-    ::lsetxattr(heldPath.c_str(), itemMark::origin, document.data(), document.size(), 0);
+    ::lsetxattr(place.c_str(), itemMark::origin, document.data(), document.size(), 0);
     auto failure = trash ? SystemError(EEXIST) : trash.error;
     for (int number = 1; failure.is(EEXIST) && number < mostOfOneName; ++number) {
         const auto name = numberedName(std::string(lastName(document)), number);
