@@ -82,7 +82,8 @@ protected:
             run();
         return seen();
     }
-    /// Performs the deed before each call in turn and checks afterwards, unless the deed was impossible.
+    /// Performs the deed before each call in turn, some of many in ./test, and checks afterwards, unless the
+    /// deed was impossible.
     void meddle(const std::function<bool()>& deed, const std::function<void(const FileCall&)>& check) const
     {
         std::vector<FileCall> done;
@@ -91,13 +92,15 @@ protected:
                 done.push_back(call);
             return Fault{};
         };
-        atEachCall(perform, [&](const FileCall&, const Ending&) {
+        const auto checkDone = [&](const FileCall&, const Ending&) {
             startAgain();
             for (const auto& call : std::exchange(done, {})) {
                 ++sweep_tests::tally().deeds;
                 check(call);
             }
-        });
+        };
+        atEachCall(
+            perform, checkDone, [](const FileCall&) { return true; }, Turns::Some);
     }
 
 private:

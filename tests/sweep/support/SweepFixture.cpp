@@ -114,17 +114,7 @@ void SweepFixture::atEachCall(const FaultFor& faultFor,
     Turns turns) const
 {
     makeDrive();
-    std::vector<int> points;
-    run([&](const FileCall& call) {
-        if (isPossible(call))
-            points.push_back(call.index);
-        return Fault{};
-    });
-    constexpr std::size_t some = 80;
-    const bool isShort = turns == Turns::Some && !::getenv("TARROW_LONG_SWEEP");
-    const auto step = isShort ? 1 + points.size() / some : 1;
-    for (std::size_t turn = 0; turn < points.size(); turn += step) {
-        const int point = points[turn];
+    for (const int point : points(isPossible, turns)) {
         makeDrive();
         FileCall met;
         const auto ending = run([&](const FileCall& call) {
@@ -137,6 +127,25 @@ void SweepFixture::atEachCall(const FaultFor& faultFor,
             "at call " + std::to_string(point) + ", " + std::to_string(met.number) + " on " + met.subject);
         check(met, ending);
     }
+}
+
+std::vector<int> SweepFixture::points(const IsPossible& isPossible, Turns turns) const
+{
+    std::vector<FileCall> calls;
+    run([&](const FileCall& call) {
+        if (isPossible(call))
+            calls.push_back(call);
+        return Fault{};
+    });
+    constexpr std::size_t some = 48;
+    const bool isShort = turns == Turns::Some && !::getenv("TARROW_LONG_SWEEP");
+    const auto step = isShort ? 1 + calls.size() / some : 1;
+    std::vector<int> chosen;
+    for (std::size_t turn = 0; turn < calls.size(); ++turn) {
+        if (turn % step == 0 || (isShort && calls[turn].changesNames()))
+            chosen.push_back(calls[turn].index);
+    }
+    return chosen;
 }
 
 void SweepFixture::startAgain() const

@@ -48,7 +48,8 @@ protected:
     /// Runs the operation and lets its calls meet faults.
     Ending run(const FaultFor& faultFor = [](const FileCall&) { return Fault{}; }) const;
     using IsPossible = std::function<bool(const FileCall&)>;
-    /// Says whether each call has its turn, or about eighty of more in ./test; the long run takes all.
+    /// Says whether each call has its turn, or in ./test about fifty of more and each that changes names;
+    /// the long run takes all.
     enum class Turns { All, Some };
     /// Runs the operation on a new drive for each of its calls in turn, or those for which the fault is
     /// possible. The call meets the fault, and it is checked afterwards. The check is told of call 0 when the
@@ -84,6 +85,8 @@ protected:
     const host::drive::DriveLayout _layout = host::drive::DriveLayout::at(_folder.at("drive")).prepare();
 
 private:
+    /// Answers the indexes of the calls that have their turn.
+    std::vector<int> points(const IsPossible& isPossible, Turns turns) const;
     void addItems(Drive& drive, const std::string& folder, const std::string& prefix) const;
     /// Answers the places in the trash with an item and a record.
     std::vector<std::string> trashPlaces() const;
