@@ -29,10 +29,7 @@ Error named(const Url& url, const Error& error)
     if (error.text(platform::errorKey::localizedDescription))
         return error;
     const auto name = screens::displayName(url.lastPathComponent());
-    auto sentence = error.is(FileErrorCode::Unsupported)
-        ? localized(
-            "“%@” is in the cloud as a whole folder or package, which can’t be downloaded yet.", {name})
-        : localized("“%@” couldn’t be downloaded.", {name});
+    auto sentence = localized("“%@” couldn’t be downloaded.", {name});
     return Error(error.domain(), error.code(),
         {{std::string(platform::errorKey::localizedDescription), std::move(sentence)},
             {std::string(platform::errorKey::filePath), url.path()}});
@@ -55,6 +52,7 @@ std::vector<Downloads::Entry> Downloads::entries() const
     for (const auto& [path, download] : _asked)
         running.try_emplace(path);
     std::vector<Entry> entries;
+    entries.reserve(running.size() + _waiting.size());
     for (const auto& [path, progress] : running)
         entries.push_back({Url::fileURL(path), progress});
     for (const auto& url : _waiting)

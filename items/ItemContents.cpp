@@ -44,8 +44,9 @@ public:
         const auto* status = values.get<platform::DownloadingStatus>(AttributeKey::DownloadingStatus);
         if (status && *status == platform::DownloadingStatus::NotDownloaded)
             keep(item, ContentPlace::Cloud);
-        else if (values.flag(AttributeKey::IsDirectory)
-            && (_place == ContentPlace::Cloud || !values.flag(AttributeKey::IsPackage)))
+        else if (values.flag(AttributeKey::IsPackage) && _place == ContentPlace::Here)
+            keep(item, ContentPlace::Here);
+        else if (values.flag(AttributeKey::IsDirectory))
             _folders.push_back(item);
         else if (values.flag(AttributeKey::IsRegularFile))
             keepFile(item);

@@ -22,8 +22,9 @@ struct FoundDocuments {
 };
 
 /// Finds the documents whose content is in a place: the given items themselves, and those in the folders
-/// among them and in the folders below. What a package holds may be in the cloud, but does not count as here,
-/// because the package would not open without it. Hidden items, links and references are left out. It ends
+/// among them and in the folders below. A package is one document that is here or in the cloud as a whole;
+/// what it holds may be in the cloud, but does not count as here, because the package would not open without
+/// it. Hidden items, links and references are left out. It ends
 /// early, with what was found until then, when it is not wanted any more. Any thread but the main thread,
 /// because it reads folders.
 FoundDocuments findDocuments(

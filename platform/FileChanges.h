@@ -67,11 +67,11 @@ public:
     /// would come to lie in itself.
     virtual std::optional<Error> moveItem(const std::string& from, const std::string& to) = 0;
 
-    /// Removes the downloaded copy of a document and keeps the content in the cloud; a promise takes the
-    /// document's place. A document that is only promised already is no error. Errors:
-    /// FileErrorCode::Unsupported for what is no document; FileErrorCode::ItemExists when a promise of
-    /// another content lies beside it; FileErrorCode::Cancelled when the document changes meanwhile. The
-    /// document stays whole after every error.
+    /// Removes the downloaded copy of a document or package and keeps the content in the cloud; a promise
+    /// takes its place. One that is only promised already is no error. Errors: FileErrorCode::Unsupported for
+    /// what is neither; FileErrorCode::ItemExists when a promise of another content lies beside it;
+    /// FileErrorCode::Cancelled when it changes meanwhile; EBUSY while something in a package is being
+    /// changed, and why a package could not be copied or removed later. It stays whole after every error.
     virtual std::optional<Error> evictItem(const std::string& path) = 0;
 
     /// Reads all of a document, as it was at one moment, to be replaced later. Errors: EFBIG beyond

@@ -34,7 +34,13 @@ protected:
     {
         if (libraryDocument().find('/' + item() + '/') != std::string::npos)
             return libraryDocument();
-        return at(item() == "folder" ? "folder/sub/b.txt" : item() == "new/one/two" ? "new" : item());
+        const std::pair<std::string, std::string> others[] = {{"folder", "folder/sub/b.txt"},
+            {"new/one/two", "new"}, {"inner/here.textbundle", "inner/here.textbundle/assets/here"}};
+        for (const auto& [argument, other] : others) {
+            if (item() == argument)
+                return at(other);
+        }
+        return at(item());
     }
     std::string target() const { return at(GetParam().arguments.back()); }
 

@@ -3,9 +3,12 @@
 
 #include "host/drive/changes/ContentCollection.h"
 
+#include "host/drive/changes/Discarding.h"
 #include "host/drive/changes/DriveEntry.h"
+#include "host/drive/changes/LocalCloudStore.h"
 #include "host/drive/changes/Promises.h"
 #include "host/drive/changes/TreeWalk.h"
+#include "host/drive/changes/WorkRecord.h"
 #include "host/system/files/DirectoryReader.h"
 #include "host/system/files/DriveNames.h"
 #include "host/system/files/ItemPaths.h"
@@ -19,6 +22,7 @@
 #include <chrono>
 #include <iterator>
 #include <map>
+#include <memory>
 #include <thread>
 #include <vector>
 
@@ -102,7 +106,37 @@ private:
     }
 };
 
-/// Reads all promises: those of items, those in the trash and those that are being removed.
+SystemResult<std::vector<std::string>> foldersIn(const FileDescriptor& folder)
+{
+    std::vector<std::string> names;
+    const auto reader = std::make_unique<system::DirectoryReader>(folder);
+    while (const auto entry = reader->next()) {
+        const auto type = entry->type ? entry->type : system::typeOfEntry(folder, entry->name);
+        if (type == platform::FileType::Directory)
+            names.emplace_back(entry->name);
+    }
+    if (reader->error())
+        return reader->error();
+    return names;
+}
+
+/// Reads the promises in packages that are in the cloud themselves.
+SystemError readPromisesInContents(const std::string& path, PromiseReading& reading)
+{
+    const auto folder = system::openFolder(path);
+    if (!folder)
+        return folder.error.is(ENOENT) ? SystemError() : folder.error;
+    const auto names = foldersIn(*folder);
+    if (!names)
+        return names.error;
+    for (const auto& name : *names)
+        TRW_TRY(walkTree(*folder, name, reading, Mounts::Enter));
+    return {};
+}
+
+/// Reads all promises: those of items, those in the trash, those that are being removed, and those in
+/// contents. A package goes into the cloud from its place and out of the cloud to be removed, so the contents
+/// are read in this order after the items.
 SystemResult<Promised> readPromises(const DriveLayout& layout)
 {
     PromiseReading reading;
@@ -115,6 +149,8 @@ SystemResult<Promised> readPromises(const DriveLayout& layout)
         if (failure && !(failure.is(ENOENT) && statusAt(home, name).error.is(ENOENT)))
             return failure;
     }
+    for (const auto& path : {layout.cloud(), layout.released()})
+        TRW_TRY(readPromisesInContents(path, reading));
     return std::move(reading.promised);
 }
 
@@ -182,11 +218,27 @@ private:
     FileDescriptor _file;
 };
 
+/// Removes a content for good, a folder with everything in it. It loses its name first, because half of a
+/// folder must not be found as a content after a kill.
+SystemError removeContent(const FileDescriptor& folder, const std::string& content, CloudStore& store)
+{
+    if (::unlinkat(folder.get(), content.c_str(), 0) == 0 || errno == ENOENT)
+        return {};
+    if (errno != EISDIR)
+        return SystemError::last(content);
+    auto gone = content;
+    if (!content.starts_with(WorkRecord::gonePrefix)) {
+        gone = uniqueName(WorkRecord::gonePrefix);
+        TRW_TRY(renameEntry(folder, content, folder, gone));
+    }
+    return discardTree(folder, gone, &store).failure;
+}
+
 } // namespace
 
 SystemResult<Outcome> ContentCollection::run()
 {
-    const auto released = namesIn(_layout.released());
+    auto released = namesIn(_layout.released());
     if (!released)
         return released.error;
     if (released->empty())
@@ -196,10 +248,20 @@ SystemResult<Outcome> ContentCollection::run()
     if (!pace.begin())
         return Outcome::Later;
     constexpr std::chrono::milliseconds tick(20); // the kernel's clock for files moves at least this often
-    std::this_thread::sleep_for(tick);
-    const auto begin = std::chrono::steady_clock::now();
-    auto outcome = collect(*released);
-    pace.end(std::chrono::duration_cast<std::chrono::milliseconds>(std::chrono::steady_clock::now() - begin));
+    constexpr int mostRounds = 4;
+    std::chrono::steady_clock::duration duration{};
+    SystemResult<Outcome> outcome(Outcome::Done);
+    // A package releases the contents of its parts when it is removed.
+    for (int round = 0; round < mostRounds && released && !released->empty(); ++round) {
+        std::this_thread::sleep_for(tick);
+        const auto begin = std::chrono::steady_clock::now();
+        outcome = collect(*released);
+        duration += std::chrono::steady_clock::now() - begin;
+        if (!outcome || *outcome == Outcome::Later)
+            break;
+        released = namesIn(_layout.released());
+    }
+    pace.end(std::chrono::duration_cast<std::chrono::milliseconds>(duration));
     return outcome;
 }
 
@@ -221,10 +283,15 @@ SystemResult<Outcome> ContentCollection::collect(const Names& released)
     for (const auto& content : released) {
         if (first->names(content))
             static_cast<void>(renameEntry(*from, content, *to, content));
-        else if (::unlinkat(from->get(), content.c_str(), 0) != 0 && errno != ENOENT)
-            return SystemError::last(content);
     }
-    return Outcome::Done;
+    LocalCloudStore store(_layout);
+    SystemError failure;
+    for (const auto& content : released) {
+        auto failed = first->names(content) ? SystemError() : removeContent(*from, content, store);
+        if (!failure)
+            failure = std::move(failed);
+    }
+    return failure ? SystemResult<Outcome>(std::move(failure)) : Outcome::Done;
 }
 
 SystemResult<Names> ContentCollection::orphans()

@@ -14,7 +14,8 @@ namespace host::drive {
 
 /// Removes the contents that were released (CloudStore::release()), once it is certain that no promise names
 /// them. Another program may have copied a promise, or put one back from a backup; such a promise keeps its
-/// content, which then belongs to it again.
+/// content, which then belongs to it again. A package that is in the cloud may hold promises itself, and
+/// these count while it is there.
 ///
 /// Certain is what two walks through all promises say in the same way: a promise that was moved in between
 /// has changed its folder. Where anything cannot be read, nothing is removed.

@@ -21,20 +21,28 @@ using host::system::FileDescriptor;
 using host::system::SystemError;
 using host::system::SystemResult;
 using platform::Error;
-using platform::FileErrorCode;
 
 namespace {
 
 constexpr std::int64_t nanosecondsPerSecond = 1'000'000'000;
 
 /// A download that ended early must not take the place of the document.
-SystemError checkSize(const FileDescriptor& file, const PromiseRecord& promise)
+SystemError checkSize(const NewFile& file, const PromiseRecord& promise)
 {
-    struct stat found;
-    if (::fstat(file.get(), &found) != 0)
-        return SystemError::last();
-    const bool isShort = promise.size && static_cast<std::uint64_t>(found.st_size) < *promise.size;
-    return isShort ? SystemError(EIO) : SystemError();
+    const auto bytes = file.bytes();
+    if (!bytes)
+        return bytes.error;
+    return promise.size && *bytes < *promise.size ? SystemError(EIO) : SystemError();
+}
+
+/// Answers the traits of a promise for a folder. A promise that another program wrote has the access of a
+/// file, and nobody could enter a folder with that.
+ItemTraits ofFolder(ItemTraits traits)
+{
+    constexpr mode_t mayRead = S_IRUSR | S_IRGRP | S_IROTH;
+    if ((traits.mode & S_IXUSR) == 0)
+        traits.mode |= (traits.mode & mayRead) >> 2;
+    return traits;
 }
 
 SystemError setModified(const FileDescriptor& file, const platform::Date& modified)
@@ -49,7 +57,7 @@ SystemError setModified(const FileDescriptor& file, const platform::Date& modifi
     return SystemError::unless(::futimens(file.get(), times) == 0);
 }
 
-/// One promised document that takes its promise's place.
+/// One promised document or folder that takes its promise's place.
 class Arrival {
 public:
     Arrival(const DriveLayout& layout, CloudStore& store, const DriveEntry& entry, OpenPromise& promise)
@@ -57,6 +65,7 @@ public:
         , _store(store)
         , _entry(entry)
         , _promise(promise)
+        , _isFolder(promise.record.kind != PromiseRecord::Kind::File)
     {
     }
     SystemError fetch(const CloudStore::Progress& progress);
@@ -64,6 +73,7 @@ public:
 
 private:
     enum class Place : std::uint8_t { Promised, Taken };
+    ItemTraits fitting(ItemTraits traits) const { return _isFolder ? ofFolder(std::move(traits)) : traits; }
     SystemError takeOver();
     SystemResult<Place> look() const;
     SystemError removePromise();
@@ -74,19 +84,20 @@ private:
     CloudStore& _store;
     const DriveEntry& _entry;
     OpenPromise& _promise;
+    const bool _isFolder;
     std::optional<NewFile> _file;
     ItemTraits _traits; ///< of the promise, as the document has taken them over
-    platform::ItemVersion _published;
+    TreeVersions _published;
 };
 
 SystemError Arrival::fetch(const CloudStore::Progress& progress)
 {
-    auto file = NewFile::create(_layout, _entry);
+    auto file = _isFolder ? NewFile::createFolder(_layout, _entry) : NewFile::create(_layout, _entry);
     if (!file)
         return file.error;
     _file.emplace(std::move(*file));
     TRW_TRY(_store.fetch(_promise.record.content, _file->descriptor(), progress));
-    return checkSize(_file->descriptor(), _promise.record);
+    return checkSize(*_file, _promise.record);
 }
 
 /// Gives the new document what the promise says now, because tags, an identifier or access may have changed
@@ -100,6 +111,7 @@ SystemError Arrival::takeOver()
     if (!traits)
         return traits.error;
     _promise.record = std::move(*now);
+    *traits = fitting(std::move(*traits));
     _traits = *traits;
     traits->attributes[itemMark::status] = "current";
     if (const auto identifier = _promise.record.documentIdentifier)
@@ -107,7 +119,7 @@ SystemError Arrival::takeOver()
     if (_promise.record.created)
         traits->attributes[itemMark::created] = std::to_string(_promise.record.created->nanoseconds);
     // The record comes first, because the attributes count before it and the access may forbid more writing.
-    const auto failure = writeMarks(_file->descriptor(), _promise.record);
+    auto failure = writeMarks(_file->descriptor(), _promise.record);
     if (failure && !failure.is(EOPNOTSUPP))
         return failure;
     TRW_TRY(traits->write(_file->descriptor()));
@@ -128,7 +140,8 @@ SystemResult<Arrival::Place> Arrival::look() const
     if (!document)
         return document.error.is(ENOENT) && !content->empty() ? SystemError(ESTALE, _entry.promiseName())
                                                               : document.error;
-    return S_ISREG(document->st_mode) ? SystemResult<Place>(Place::Taken) : SystemError(EEXIST, _entry.name);
+    const bool isOfKind = _isFolder ? S_ISDIR(document->st_mode) : S_ISREG(document->st_mode);
+    return isOfKind ? SystemResult<Place>(Place::Taken) : SystemError(EEXIST, _entry.name);
 }
 
 SystemError Arrival::takePlace()
@@ -139,10 +152,10 @@ SystemError Arrival::takePlace()
     if (*place == Place::Taken)
         return {};
     TRW_TRY(takeOver());
-    struct stat whole;
-    if (::fstat(_file->descriptor().get(), &whole) != 0)
-        return SystemError::last(_entry.name);
-    _published = versionOf(whole);
+    auto versions = _file->versions();
+    if (!versions)
+        return versions.error;
+    _published = std::move(*versions);
     // The promise and its content outlive a power cut that takes the new name, because both go later in the
     // same journal, and the content after a sync of everything.
     TRW_TRY(_file->publish(_entry, _entry.name, NewFile::Sync::Content));
@@ -168,7 +181,7 @@ SystemError Arrival::adoptChanges()
     const auto now = ItemTraits::read(_promise.file);
     if (!now)
         return now.error;
-    TRW_TRY(now->writeChanges(_traits, _file->descriptor()));
+    TRW_TRY(fitting(*now).writeChanges(_traits, _file->descriptor()));
     const auto record = readPromise(_promise.file);
     if (!record || record->documentIdentifier == _promise.record.documentIdentifier)
         return record.error;
@@ -185,8 +198,8 @@ SystemError Arrival::withdraw()
     auto held = HeldItem::take(_layout, _entry, _entry.name);
     if (!held)
         return {};
-    const auto found = statusAt(held->folder(), held->name());
-    const bool isGone = found && isSameContent(_published, versionOf(*found)) && !held->remove(nullptr);
+    const auto found = readVersions(held->folder(), held->name());
+    const bool isGone = found && *found == _published && !held->remove(nullptr);
     return isGone ? SystemError(ENOENT, _entry.promiseName()) : SystemError();
 }
 
@@ -212,8 +225,6 @@ std::optional<Error> tryToBringHere(const DriveLayout& layout, CloudStore& store
     if (!promise)
         return itemError(promise.error, path);
     const auto& record = promise->record;
-    if (record.kind != PromiseRecord::Kind::File)
-        return Error(FileErrorCode::Unsupported);
     if (record.content.empty())
         return missingContent(path);
     Arrival arrival(layout, store, item->entry, *promise);

@@ -15,7 +15,6 @@ namespace host::drive {
 using host::system::FileDescriptor;
 using host::system::SystemError;
 using host::system::SystemResult;
-using platform::ItemVersion;
 
 namespace {
 
@@ -33,13 +32,14 @@ SystemResult<FileDescriptor> openStore(const std::string& path)
     return folder;
 }
 
-/// Answers ECANCELED when the file that was moved into the store is another version.
-SystemError checkStored(const FileDescriptor& folder, const std::string& content, const ItemVersion& version)
+/// Answers ECANCELED when what was moved into the store has other versions.
+SystemError checkStored(
+    const FileDescriptor& folder, const std::string& content, const TreeVersions& versions)
 {
-    const auto stored = statusAt(folder, content);
+    const auto stored = readVersions(folder, content);
     if (!stored)
         return stored.error;
-    return isSameContent(version, versionOf(*stored)) ? SystemError() : SystemError(ECANCELED, content);
+    return *stored == versions ? SystemError() : SystemError(ECANCELED, content);
 }
 
 } // namespace
@@ -68,29 +68,34 @@ SystemError LocalCloudStore::fetch(
     const auto from = openContent(content);
     if (!from)
         return from.error;
-    struct stat found;
-    if (::fstat(from->get(), &found) != 0)
+    struct stat found, target;
+    if (::fstat(from->get(), &found) != 0 || ::fstat(into.get(), &target) != 0)
         return SystemError::last(content);
-    if (!S_ISREG(found.st_mode))
+    const bool isFolder = S_ISDIR(found.st_mode);
+    if ((!isFolder && !S_ISREG(found.st_mode)) || isFolder != S_ISDIR(target.st_mode))
         return {EOPNOTSUPP, content};
-    const auto total = static_cast<std::uint64_t>(found.st_size);
+    const auto total = isFolder ? checkCopyable(*from, ".")
+                                : SystemResult<std::uint64_t>(static_cast<std::uint64_t>(found.st_size));
+    if (!total)
+        return total.error;
     std::uint64_t done = 0;
-    TRW_TRY(copyBytes(*from, into, [&](std::uint64_t copied) {
-        done = copied;
-        return progress(copied, total) == Continue::Yes ? SystemError() : SystemError(ECANCELED, content);
-    }));
-    return done < total ? SystemError(EIO, content) : SystemError();
+    const CopyProgress copied = [&](std::uint64_t bytes) {
+        done = bytes;
+        return progress(bytes, *total) == Continue::Yes ? SystemError() : SystemError(ECANCELED, content);
+    };
+    TRW_TRY(isFolder ? copyContents(*from, into, copied) : copyBytes(*from, into, copied));
+    return done < *total ? SystemError(EIO, content) : SystemError();
 }
 
 SystemError LocalCloudStore::store(
-    const DriveEntry& document, const ItemVersion& version, const std::string& content)
+    const DriveEntry& document, const TreeVersions& versions, const std::string& content)
 {
     const auto folder = openOwnFolder(_layout.cloud());
     if (!folder)
         return folder.error;
     TRW_TRY(renameEntry(document.folder, document.name, *folder, content));
     // A power cut that takes this rename leaves the document in its place, where it hides its promise.
-    auto failure = checkStored(*folder, content, version);
+    auto failure = checkStored(*folder, content, versions);
     // When the file cannot be given its old name back, it stays in the store as a content.
     if (failure)
         static_cast<void>(renameEntry(*folder, content, document.folder, document.name));
@@ -124,6 +129,9 @@ std::optional<bool> LocalCloudStore::has(const std::string& content)
 bool LocalCloudStore::holdsOtherThan(const std::string& content, const FileDescriptor& document)
 {
     const auto file = openContent(content);
+    struct stat found;
+    if (file && ::fstat(document.get(), &found) == 0 && S_ISDIR(found.st_mode))
+        return !isSameTree(*file, document);
     return file ? static_cast<bool>(compareBytes(*file, document)) : !file.error.is(ENOENT);
 }
 

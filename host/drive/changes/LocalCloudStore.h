@@ -7,8 +7,8 @@
 
 namespace host::drive {
 
-/// Stores contents as files in the drive's own `cloud/` folder, which is made with the first content. A name
-/// that could lead out of the folder is refused (ENOENT).
+/// Stores contents as files and folders in the drive's own `cloud/` folder, which is made with the first
+/// content. A name that could lead out of the folder is refused (ENOENT).
 class LocalCloudStore : public CloudStore {
 public:
     explicit LocalCloudStore(DriveLayout layout)
@@ -20,8 +20,8 @@ public:
 
     system::SystemError fetch(
         const std::string& content, const system::FileDescriptor& into, const Progress& progress) override;
-    system::SystemError store(const DriveEntry& document, const platform::ItemVersion& version,
-        const std::string& content) override;
+    system::SystemError store(
+        const DriveEntry& document, const TreeVersions& versions, const std::string& content) override;
     system::SystemError release(const std::string& content) override;
     std::optional<bool> has(const std::string& content) override;
     bool holdsOtherThan(const std::string& content, const system::FileDescriptor& document) override;

@@ -5,8 +5,6 @@
 
 #include "host/drive/changes/CloudStore.h"
 #include "host/drive/changes/HeldItem.h"
-#include "host/drive/changes/ItemTraits.h"
-#include "host/drive/changes/NewFile.h"
 #include "host/drive/changes/Promises.h"
 #include "host/drive/changes/TreeCopy.h"
 #include "host/drive/records/BeneathRoot.h"
@@ -18,7 +16,6 @@
 #include "host/system/files/PromisedNames.h"
 #include "host/system/files/SystemErrors.h"
 #include "host/system/texts/Translate.h"
-#include "platform/Log.h"
 
 #include <fcntl.h>
 
@@ -35,9 +32,6 @@ using platform::FileErrorCode;
 using platform::ItemVersion;
 
 namespace {
-
-/// With it the short form of a promise fits into the inode of its file.
-constexpr const char* contentPrefix = "c-";
 
 /// These two numbers stand for refusals between the steps below. No system call of those steps fails with
 /// them otherwise.
@@ -275,53 +269,6 @@ SystemError LocalItemChanges::removeMoved(
     if (before != *after)
         return SystemError(changedMeanwhile, source.name);
     return held->remove(nullptr);
-}
-
-std::optional<Error> LocalItemChanges::evictItem(const std::string& path)
-{
-    const auto item = LocatedItem::locate(_layout, path);
-    if (!item || item->isPromise())
-        return item.error;
-    if (!S_ISREG(item->found.st_mode))
-        return Error(FileErrorCode::Unsupported);
-    auto failure = settleTwin(_layout, item->entry, *_store);
-    if (!failure)
-        failure = replaceByPromise(*item);
-    return failure ? std::optional(changeError(failure, path)) : std::nullopt;
-}
-
-SystemError LocalItemChanges::replaceByPromise(const LocatedItem& item)
-{
-    static constexpr platform::Operation op{"-[LocalItemChanges replaceByPromise:]"};
-    const auto& entry = item.entry;
-    const FileDescriptor document(::openat(
-        entry.folder.get(), entry.name.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
-    const auto traits = document ? ItemTraits::read(document) : SystemError::last(entry.name);
-    if (!traits)
-        return traits.error;
-    const auto content = uniqueName(contentPrefix);
-    auto file = NewFile::create(_layout, entry, content);
-    if (!file)
-        return file.error;
-    TRW_TRY(writePromise(file->descriptor(), promiseFor(document, entry.name, content)));
-    TRW_TRY(traits->ofPromise().write(file->descriptor()));
-    // While both exist the document counts. Both names change in one journal, in this order, so one sync at
-    // the end is enough.
-    TRW_TRY(file->publish(entry, entry.promiseName(), NewFile::Sync::Nothing));
-    auto failure = _store->store(entry, versionOf(item.found), content);
-    if (failure) {
-        // A promise that cannot be taken back is taken back by the next start.
-        if (withdrawPromise(_layout, entry, *_store, content))
-            file->keepRecord();
-        return failure;
-    }
-    const auto now = ItemTraits::read(document);
-    const auto missed = now ? now->writeChanges(*traits, file->descriptor()) : now.error;
-    if (missed)
-        op.warning("Cannot give the promise of %@ what has changed meanwhile: %@", entry.path, missed);
-    // The document is in the cloud by now, whether or not its folder can be opened for a sync of its own.
-    static_cast<void>(syncFolder(entry.folder));
-    return SystemError::unless(::fsync(file->descriptor().get()) == 0, entry.name);
 }
 
 } // namespace host::drive

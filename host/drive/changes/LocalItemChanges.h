@@ -7,6 +7,7 @@
 #include "host/drive/changes/TreeWalk.h"
 #include "platform/FileChanges.h"
 
+#include <functional>
 #include <memory>
 
 namespace host::drive {
@@ -22,9 +23,15 @@ class CloudStore;
 /// renamed. Only then is the original removed; when that fails, the copy is removed again.
 class LocalItemChanges : public platform::FileChanges {
 public:
-    LocalItemChanges(DriveLayout layout, std::shared_ptr<CloudStore> store)
+    /// Says whether a folder of this name is a package, which a person sees as one document.
+    using IsPackage = std::function<bool(const std::string& name)>;
+
+    LocalItemChanges(
+        DriveLayout layout, std::shared_ptr<CloudStore> store,
+        IsPackage isPackage = [](const std::string&) { return false; })
         : _layout(std::move(layout))
         , _store(std::move(store))
+        , _isPackage(std::move(isPackage))
     {
     }
 
@@ -66,6 +73,7 @@ private:
 
     DriveLayout _layout;
     std::shared_ptr<CloudStore> _store;
+    IsPackage _isPackage;
 };
 
 } // namespace host::drive

@@ -3,6 +3,8 @@
 
 #include "host/drive/changes/NewFile.h"
 
+#include "host/drive/changes/TreeCopy.h"
+#include "host/drive/records/BeneathRoot.h"
 #include "host/system/files/ItemPaths.h"
 
 #include <fcntl.h>
@@ -26,32 +28,72 @@ NewFile::NewFile(NewFile&& other) noexcept
 
 NewFile::~NewFile()
 {
-    if (!_name.empty())
-        ::unlinkat(_folder.get(), _name.c_str(), 0);
+    if (_name.empty() || ::unlinkat(_folder.get(), _name.c_str(), 0) == 0 || errno != EISDIR)
+        return;
+    // The next start removes the rest of a folder.
+    if (removeTree(_folder, _name))
+        _record->keep();
 }
 
-SystemResult<NewFile> NewFile::create(
-    const DriveLayout& layout, const DriveEntry& entry, const std::string& content)
+/// Answers one that has its record, but nothing under its private name yet.
+SystemResult<NewFile> NewFile::begin(
+    const DriveLayout& layout, const DriveEntry& entry, const std::string& name, const std::string& content)
 {
     NewFile fresh;
-    const auto name = uniqueName(WorkRecord::temporaryPrefix);
     auto record =
         WorkRecord::write(layout, {entry.path, system::siblingPath(entry.path, name), {}, content, {}, {}});
     if (!record)
         return record.error;
     fresh._record.emplace(std::move(*record));
     fresh._folder = FileDescriptor(::fcntl(entry.folder.get(), F_DUPFD_CLOEXEC, 0));
-    fresh._file = FileDescriptor(
-        ::openat(entry.folder.get(), name.c_str(), O_RDWR | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC, 0666));
-    if (!fresh._folder || !fresh._file)
+    if (!fresh._folder)
         return SystemError::last(name);
-    fresh._name = name;
+    return fresh;
+}
+
+SystemResult<NewFile> NewFile::create(
+    const DriveLayout& layout, const DriveEntry& entry, const std::string& content)
+{
+    const auto name = uniqueName(WorkRecord::temporaryPrefix);
+    auto fresh = begin(layout, entry, name, content);
+    if (!fresh)
+        return fresh;
+    constexpr int flags = O_RDWR | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC;
+    fresh->_file = FileDescriptor(::openat(entry.folder.get(), name.c_str(), flags, 0666));
+    if (!fresh->_file)
+        return SystemError::last(name);
+    fresh->_name = name;
+    return fresh;
+}
+
+SystemResult<NewFile> NewFile::createFolder(const DriveLayout& layout, const DriveEntry& entry)
+{
+    const auto name = uniqueName(WorkRecord::temporaryPrefix);
+    auto fresh = begin(layout, entry, name, {});
+    if (!fresh)
+        return fresh;
+    if (::mkdirat(entry.folder.get(), name.c_str(), S_IRWXU) != 0)
+        return SystemError::last(name);
+    fresh->_name = name;
+    auto opened = openSubfolder(entry.folder, name);
+    if (!opened)
+        return opened.error;
+    fresh->_file = std::move(*opened);
     return fresh;
 }
 
 SystemError NewFile::write(std::string_view text) const
 {
     return system::writeWhole(_file, text);
+}
+
+SystemResult<std::uint64_t> NewFile::bytes() const
+{
+    struct stat own;
+    if (::fstat(_file.get(), &own) != 0)
+        return SystemError::last(_name);
+    return S_ISDIR(own.st_mode) ? checkCopyable(_folder, _name)
+                                : SystemResult<std::uint64_t>(static_cast<std::uint64_t>(own.st_size));
 }
 
 SystemError NewFile::publish(const DriveEntry& entry, const std::string& name, Sync sync)

@@ -5,6 +5,7 @@
 
 #include "host/drive/changes/DriveEntry.h"
 #include "host/drive/changes/ItemTraits.h"
+#include "host/drive/changes/TreeWalk.h"
 #include "host/drive/changes/WorkRecord.h"
 
 #include <optional>
@@ -12,10 +13,11 @@
 
 namespace host::drive {
 
-/// A file that is being written in its final folder, under a private name until it is whole. A file that is
-/// not published is removed by the destructor, or at the next start if the process was killed.
+/// A file that is being written in its final folder, under a private name until it is whole, or a folder with
+/// everything in it. What is not published is removed by the destructor, or at the next start if the process
+/// was killed.
 ///
-/// It replaces a document by exchanging the two names in one step and comparing what comes out with the
+/// A file replaces a document by exchanging the two names in one step and comparing what comes out with the
 /// expected version. When another program has saved meanwhile, the names are exchanged back, as often as yet
 /// another version comes out, so that the newest one has the name in the end.
 class NewFile {
@@ -29,18 +31,24 @@ public:
     static system::SystemResult<NewFile> create(
         const DriveLayout& layout, const DriveEntry& entry, const std::string& content);
 
+    /// Creates an empty folder beside an entry, in the same way. Whoever fills it syncs what is in it.
+    static system::SystemResult<NewFile> createFolder(const DriveLayout& layout, const DriveEntry& entry);
+
     NewFile(NewFile&& other) noexcept;
     NewFile& operator=(NewFile&&) = delete;
     ~NewFile();
 
     const system::FileDescriptor& descriptor() const { return _file; }
+    /// Answers the versions of everything in it, and the bytes of all files, while it has its private name.
+    system::SystemResult<TreeVersions> versions() const { return readVersions(_folder, _name); }
+    system::SystemResult<std::uint64_t> bytes() const;
     /// Writes a text.
     system::SystemError write(std::string_view text) const;
     /// Says what is on the disk when publish() answers. The content alone is enough where what stood for it
     /// stays until the name is there, too; nothing for a file without content that its caller syncs.
     enum class Sync : std::uint8_t { Nothing, Content, ContentAndName };
-    /// Gives the file its name. It never replaces a file (EEXIST). The record for the next start stays until
-    /// the end.
+    /// Gives the file or folder its name. It never replaces anything (EEXIST). The record for the next start
+    /// stays until the end.
     system::SystemError publish(
         const DriveEntry& entry, const std::string& name, Sync sync = Sync::ContentAndName);
     /// Syncs the file and gives it the name of the `expected` version, which is removed for good. What became
@@ -54,6 +62,8 @@ public:
 
 private:
     NewFile() = default;
+    static system::SystemResult<NewFile> begin(const DriveLayout& layout, const DriveEntry& entry,
+        const std::string& name, const std::string& content);
     system::SystemError takeHeldName(
         const DriveLayout& layout, const DriveEntry& entry, const platform::ItemVersion& expected);
     system::SystemError exchange(const DriveEntry& entry) const;

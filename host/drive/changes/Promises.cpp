@@ -48,7 +48,10 @@ PromiseRecord promiseFor(const FileDescriptor& document, const std::string& name
 {
     const auto facts = lookAtOpenFile(document);
     PromiseRecord promise;
-    promise.size = facts.status.stx_size;
+    if (facts.isDirectory())
+        promise.kind = PromiseRecord::Kind::Package;
+    else
+        promise.size = facts.status.stx_size;
     promise.modified = facts.modified();
     promise.created = facts.created();
     promise.shared = facts.marks.shared;

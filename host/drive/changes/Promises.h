@@ -29,7 +29,8 @@ struct OpenPromise {
     }
 };
 
-/// Answers the promise of an open document of this name, whose content gets the name `content`.
+/// Answers the promise of an open document of this name, whose content gets the name `content`. That of a
+/// folder is a package's, and says no size.
 PromiseRecord promiseFor(
     const system::FileDescriptor& document, const std::string& name, const std::string& content);
 

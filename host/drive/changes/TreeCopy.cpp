@@ -83,8 +83,19 @@ SystemResult<std::size_t> readPiece(const FileDescriptor& file, Piece& piece)
     return filled;
 }
 
+/// A copy that is under way.
+struct Copying {
+    const CopyProgress& copied;
+    std::uint64_t done = 0; ///< bytes of whole files
+
+    SystemError tell(std::uint64_t ofThisFile) const
+    {
+        return copied ? copied(done + ofThisFile) : SystemError();
+    }
+};
+
 SystemError copyFile(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
-    const std::string& newName)
+    const std::string& newName, Copying& copying)
 {
     const auto from = openForReading(folder, name);
     struct stat status;
@@ -96,8 +107,13 @@ SystemError copyFile(const FileDescriptor& folder, const std::string& name, cons
         ::openat(target.get(), newName.c_str(), O_RDWR | O_CREAT | O_EXCL | openFlags, S_IRUSR | S_IWUSR));
     if (!to)
         return SystemError::last(newName);
-    TRW_TRY(copyBytes(from, to, {}));
+    std::uint64_t bytes = 0;
+    TRW_TRY(copyBytes(from, to, [&](std::uint64_t ofThisFile) {
+        bytes = ofThisFile;
+        return copying.tell(bytes);
+    }));
     TRW_TRY(finish(from, to, status));
+    copying.done += bytes;
     return compareBytes(from, to);
 }
 
@@ -111,10 +127,20 @@ SystemError copyLink(const FileDescriptor& folder, const std::string& name, cons
 }
 
 SystemError copyItem(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
-    const std::string& newName, int level);
+    const std::string& newName, int level, Copying& copying);
+
+SystemError copyAll(const FileDescriptor& from, const FileDescriptor& to, int level, Copying& copying)
+{
+    const auto names = readNames(from);
+    if (!names)
+        return names.error;
+    for (const auto& each : *names)
+        TRW_TRY(copyItem(from, each, to, each, level, copying));
+    return {};
+}
 
 SystemError copyFolder(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
-    const std::string& newName, int level)
+    const std::string& newName, int level, Copying& copying)
 {
     const auto from = openSubfolder(folder, name);
     if (!from)
@@ -127,27 +153,51 @@ SystemError copyFolder(const FileDescriptor& folder, const std::string& name, co
     const auto to = openSubfolder(target, newName);
     if (!to)
         return to.error;
-    const auto names = readNames(*from);
-    if (!names)
-        return names.error;
-    for (const auto& each : *names)
-        TRW_TRY(copyItem(*from, each, *to, each, level + 1));
+    TRW_TRY(copyAll(*from, *to, level + 1, copying));
     return finish(*from, *to, status);
 }
 
 SystemError copyItem(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
-    const std::string& newName, int level)
+    const std::string& newName, int level, Copying& copying)
 {
     const auto found = statusAt(folder, name);
     if (!found)
         return found.error;
     if (level >= mostLevels)
         return {ELOOP, name};
+    TRW_TRY(copying.tell(0));
     if (S_ISDIR(found->st_mode))
-        return copyFolder(folder, name, target, newName, level);
+        return copyFolder(folder, name, target, newName, level, copying);
     return S_ISLNK(found->st_mode) ? copyLink(folder, name, target, newName)
-                                   : copyFile(folder, name, target, newName);
+                                   : copyFile(folder, name, target, newName, copying);
 }
+
+class CopyableCheck : public TreeVisitor {
+public:
+    std::uint64_t bytes = 0;
+
+    SystemError visitItem(
+        const FileDescriptor& folder, const std::string& name, const struct stat& found) override
+    {
+        if (!S_ISREG(found.st_mode))
+            return S_ISLNK(found.st_mode) ? SystemError() : SystemError(EOPNOTSUPP, name);
+        bytes += static_cast<std::uint64_t>(found.st_size);
+        return SystemError::unless(::faccessat(folder.get(), name.c_str(), R_OK, AT_EACCESS) == 0, name);
+    }
+    SystemError enterFolder(
+        const FileDescriptor&, const struct stat&, const std::vector<std::string>&) override
+    {
+        return ++_levels < mostLevels ? SystemError() : SystemError(ELOOP);
+    }
+    SystemError leaveFolder(const FileDescriptor&, const std::string&) override
+    {
+        --_levels;
+        return {};
+    }
+
+private:
+    int _levels = 0;
+};
 
 /// The two names, in two open folders, that are compared.
 struct Pair {
@@ -167,15 +217,18 @@ std::optional<std::vector<std::string>> sortedNames(const FileDescriptor& folder
 
 bool isSameItem(const Pair& pair, int level);
 
+bool holdSame(const FileDescriptor& a, const FileDescriptor& b, int level)
+{
+    const auto names = sortedNames(a), others = names ? sortedNames(b) : std::nullopt;
+    return others && *names == *others && std::ranges::all_of(*names, [&](const std::string& name) {
+        return isSameItem({a, name, b, name}, level);
+    });
+}
+
 bool isSameFolder(const Pair& pair, int level)
 {
     const auto a = openSubfolder(pair.folder, pair.name), b = openSubfolder(pair.otherFolder, pair.otherName);
-    if (!a || !b || level >= mostLevels)
-        return false;
-    const auto names = sortedNames(*a), others = names ? sortedNames(*b) : std::nullopt;
-    return others && *names == *others && std::ranges::all_of(*names, [&](const std::string& name) {
-        return isSameItem({*a, name, *b, name}, level + 1);
-    });
+    return a && b && level < mostLevels && holdSame(*a, *b, level + 1);
 }
 
 bool isSameLink(const Pair& pair)
@@ -204,8 +257,7 @@ bool isSameItem(const Pair& pair, int level)
 
 } // namespace
 
-SystemError copyBytes(const FileDescriptor& from, const FileDescriptor& to,
-    const std::function<SystemError(std::uint64_t)>& copied)
+SystemError copyBytes(const FileDescriptor& from, const FileDescriptor& to, const CopyProgress& copied)
 {
     const auto piece = std::make_unique<Piece>();
     std::uint64_t done = 0;
@@ -240,13 +292,34 @@ SystemError compareBytes(const FileDescriptor& a, const FileDescriptor& b)
 SystemError copyTree(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
     const std::string& newName)
 {
-    return copyItem(folder, name, target, newName, 0);
+    const CopyProgress untold;
+    Copying copying{untold};
+    return copyItem(folder, name, target, newName, 0, copying);
+}
+
+SystemError copyContents(
+    const FileDescriptor& folder, const FileDescriptor& target, const CopyProgress& copied)
+{
+    Copying copying{copied};
+    return copyAll(folder, target, 1, copying);
+}
+
+SystemResult<std::uint64_t> checkCopyable(const FileDescriptor& folder, const std::string& name)
+{
+    CopyableCheck check;
+    TRW_TRY(walkTree(folder, name, check));
+    return check.bytes;
 }
 
 bool isSameTree(const FileDescriptor& folder, const std::string& name, const FileDescriptor& otherFolder,
     const std::string& otherName)
 {
     return isSameItem({folder, name, otherFolder, otherName}, 0);
+}
+
+bool isSameTree(const FileDescriptor& folder, const FileDescriptor& otherFolder)
+{
+    return holdSame(folder, otherFolder, 1);
 }
 
 } // namespace host::drive

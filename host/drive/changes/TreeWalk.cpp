@@ -117,6 +117,14 @@ public:
     {
         return SystemError::unless(::unlinkat(folder.get(), name.c_str(), 0) == 0 || errno == ENOENT, name);
     }
+    SystemError enterFolder(
+        const FileDescriptor& folder, const struct stat& self, const std::vector<std::string>&) override
+    {
+        // A copy of a folder that nobody may write in cannot be written in either.
+        if ((self.st_mode & S_IRWXU) != S_IRWXU)
+            ::fchmod(folder.get(), self.st_mode | S_IRWXU);
+        return {};
+    }
     SystemError leaveFolder(const FileDescriptor& parent, const std::string& name) override
     {
         return SystemError::unless(::unlinkat(parent.get(), name.c_str(), AT_REMOVEDIR) == 0, name);

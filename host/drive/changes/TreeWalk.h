@@ -48,8 +48,9 @@ system::SystemError walkTree(const system::FileDescriptor& parent, const std::st
 /// Answers the names in an open folder. They are read at once, because the folder may change meanwhile.
 system::SystemResult<std::vector<std::string>> readNames(const system::FileDescriptor& folder);
 
-/// Removes a name from an open folder, a folder with everything in it; a link's target stays. An error means
-/// that something could not be removed; what was removed before stays removed.
+/// Removes a copy from an open folder, a folder with everything in it, also where the folder may not be
+/// written in; a link's target stays. An error means that something could not be removed; what was removed
+/// before stays removed.
 system::SystemError removeTree(const system::FileDescriptor& folder, const std::string& name);
 
 /// The versions of an item and of everything in it, by device and inode.

@@ -12,8 +12,8 @@ namespace host::drive {
 class IndexedItemChanges : public LocalItemChanges {
 public:
     IndexedItemChanges(const DriveLayout& layout, std::shared_ptr<CloudStore> store,
-        std::shared_ptr<LocalDocumentIdentifiers> identifiers)
-        : LocalItemChanges(layout, std::move(store))
+        std::shared_ptr<LocalDocumentIdentifiers> identifiers, IsPackage isPackage)
+        : LocalItemChanges(layout, std::move(store), std::move(isPackage))
         , _identifiers(std::move(identifiers))
     {
     }

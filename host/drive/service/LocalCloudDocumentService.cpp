@@ -3,9 +3,24 @@
 
 #include "host/drive/service/LocalCloudDocumentService.h"
 
+#include "platform/TypeRegistry.h"
+#include "platform/Url.h"
 #include "platform/Weakly.h"
 
 namespace host::drive {
+
+namespace {
+
+/// Answers the function that says whether a folder's name is a package's.
+LocalItemChanges::IsPackage isPackageBy(const std::shared_ptr<platform::TypeRegistry>& types)
+{
+    return [types](const std::string& name) {
+        const auto type = types->typeForExtension(platform::Url::fileURL('/' + name).pathExtension());
+        return type && types->conformsTo(*type, platform::typeIdentifier::package);
+    };
+}
+
+} // namespace
 
 std::shared_ptr<LocalCloudDocumentService> LocalCloudDocumentService::create(
     const DriveLayout& layout, const DriveDependencies& dependencies, const Settings& settings)
@@ -21,7 +36,8 @@ LocalCloudDocumentService::LocalCloudDocumentService(
     , _store(std::make_shared<LocalCloudStore>(layout))
     , _upkeep(std::make_shared<DriveUpkeep>(layout, _store, dependencies.dispatch))
     , _identifiers(LocalDocumentIdentifiers::create(layout, dependencies.dispatch))
-    , _itemChanges(std::make_shared<IndexedItemChanges>(layout, _store, _identifiers))
+    , _itemChanges(std::make_shared<IndexedItemChanges>(
+          layout, _store, _identifiers, isPackageBy(dependencies.typeRegistry)))
     , _trash(IndexedTrash::create(layout, _itemChanges, _store, _identifiers, dependencies))
     , _containers(std::make_shared<LocalContainers>(layout, settings.languages, _itemChanges))
     , _promisedItems(layout,

@@ -8,6 +8,7 @@
 #include "host/drive/changes/ItemTraits.h"
 #include "host/drive/changes/NewFile.h"
 #include "host/drive/changes/Promises.h"
+#include "host/drive/changes/TreeCopy.h"
 #include "host/drive/records/SmallFile.h"
 #include "host/drive/trash/LocalTrash.h"
 #include "host/drive/trash/TrashedContent.h"
@@ -68,13 +69,14 @@ std::vector<TrashedItem> LocalTrash::contentsWithoutPromise()
         ::open(_layout.cloud().c_str(), O_PATH | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
     for (const auto& content : _contents) {
         const auto found = cloud ? statusAt(cloud, content) : SystemError(ENOENT, content);
-        if (!found || !S_ISREG(found->st_mode))
+        if (!found || (!S_ISREG(found->st_mode) && !S_ISDIR(found->st_mode)))
             continue;
         TrashedItem item;
         item.identifier = std::string(contentPrefix) + content;
         item.name = nameOfContents();
         item.isPromise = true;
-        item.size = static_cast<std::uint64_t>(found->st_size);
+        item.type = system::fileType(found->st_mode);
+        item.size = checkCopyable(cloud, content).value;
         item.reason = TrashedItem::Reason::ContentWithoutPromise;
         items.push_back(std::move(item));
     }
@@ -120,10 +122,13 @@ SystemError LocalTrash::promiseContent(const DriveEntry& entry, const std::strin
     const auto traits = ItemTraits::read(document);
     if (!traits)
         return traits.error;
+    auto promise = promiseFor(document, entry.name, content);
+    if (promise.kind == PromiseRecord::Kind::Package)
+        promise.size = checkCopyable(*cloud, content).value;
     auto file = NewFile::create(_layout, entry, content);
     if (!file)
         return file.error;
-    TRW_TRY(writePromise(file->descriptor(), promiseFor(document, entry.name, content)));
+    TRW_TRY(writePromise(file->descriptor(), promise));
     TRW_TRY(traits->ofPromise().write(file->descriptor()));
     return file->publish(entry, entry.promiseName());
 }

@@ -18,6 +18,7 @@
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
+#include <iterator>
 #include <ostream>
 #include <set>
 
@@ -39,6 +40,8 @@ constexpr const char* marked = "marked";
 /// Names that are too long for the suffix of a promise.
 const std::string longDocument = "long/" + std::string(250, 'd'),
                   longPromise = "long/" + std::string(255, 'p');
+/// Folders that a person sees as documents.
+const std::string package = "inner/here.textbundle", packagePromise = "inner/far.textbundle";
 
 void PrintTo(const Operation& operation, std::ostream* stream)
 {
@@ -63,6 +66,7 @@ std::vector<Operation> operations()
         {"restoreAcross", {"restore", trashedFolder}, FileSystems::Several},
         {"drop", {"drop", trashedFolder}}, {"save", {"save", "inner/file.txt", "folder/a.txt"}},
         {"evict", {"evict", "inner/file.txt"}}, {"fetch", {"fetch", "inner/p.txt"}},
+        {"evictPackage", {"evict", package}}, {"fetchPackage", {"fetch", packagePromise}},
         {"tagPromise", {"tag", "inner/p.txt", "Red", "Blue"}}, {"evictLong", {"evict", longDocument}},
         {"fetchLong", {"fetch", longPromise}}, {"renameLong", {"move", longPromise, longDocument + "x"}},
         {"shortenLong", {"move", longPromise, "inner/new.txt"}},
@@ -86,6 +90,8 @@ void SweepFixture::makeDrive() const
     write(at("inner/twin.txt"), "of the document");
     promise("inner/twin.txt", "that nobody has seen");
     promise("bystander.pdf", "kept");
+    writePackage(at(package), "here");
+    promisePackage();
     write(at(longDocument), "dddd");
     promise(longPromise, "llll");
     promise("gone/q.pdf", "qqq");
@@ -186,7 +192,7 @@ void SweepFixture::addItems(Drive& drive, const std::string& folder, const std::
         const auto shown = prefix.empty() ? path : prefix + path.substr(folder.size() + 1);
         if (const auto item = PromiseRecord::itemPathFor(path)) {
             const auto promised = prefix.empty() ? *item : prefix + item->substr(folder.size() + 1);
-            drive["promise of " + promised] = behind(path);
+            addPromised(drive, "promise of " + promised, path);
             const auto record = host::drive::readPromise(path).value.value_or(PromiseRecord());
             for (const auto& tag : record.tags)
                 drive["tag " + tag + " of " + promised] = marked;
@@ -201,6 +207,27 @@ void SweepFixture::addItems(Drive& drive, const std::string& folder, const std::
             if (host::drive::documentIdentifierAt(path) != 0)
                 drive["identifier of " + shown] = marked;
         }
+    }
+}
+
+/// Adds what is behind a promise, a package with everything in it.
+void SweepFixture::addPromised(Drive& drive, const std::string& shown, const std::string& promisePath) const
+{
+    const auto content = contentBehind(promisePath);
+    if (!fs::is_directory(content)) {
+        drive[shown] = content.empty() ? "nothing" : read(content);
+        return;
+    }
+    drive[shown] = "folder";
+    for (const auto& each : fs::recursive_directory_iterator(content)) {
+        const auto path = each.path().string();
+        if (const auto item = PromiseRecord::itemPathFor(path))
+            addPromised(drive, shown + item->substr(content.size()), path);
+        else
+            drive[shown + path.substr(content.size())] = each.is_symlink()
+                ? "link to " + fs::read_symlink(path).string()
+                : each.is_directory() ? "folder"
+                                      : read(path);
     }
 }
 
@@ -243,7 +270,7 @@ Drive SweepFixture::noticed() const
 std::vector<std::string> SweepFixture::leftovers() const
 {
     std::vector<std::string> found;
-    std::size_t contents = 0;
+    std::set<std::string> contents, named;
     const auto places = trashPlaces();
     const auto isInTrash = [&](const std::string& path) {
         return std::ranges::any_of(places, [&](const auto& place) {
@@ -255,22 +282,18 @@ std::vector<std::string> SweepFixture::leftovers() const
     for (const auto& entry : fs::recursive_directory_iterator(_layout.home())) {
         const auto path = entry.path().string();
         const auto name = entry.path().filename().string();
+        if (PromiseRecord::itemPathFor(path))
+            named.insert(host::drive::readPromise(path).value.value_or(PromiseRecord()).content);
         if (path.starts_with(_layout.cloud() + '/'))
-            ++contents;
+            contents.insert(*fs::relative(path, _layout.cloud()).begin());
         else if (isInTrash(path))
             continue;
         else if ((name.starts_with(".trw") && !PromiseRecord::itemPathFor(path))
             || path.starts_with(_layout.held() + '/') || path.starts_with(_layout.trash() + '/'))
             found.push_back(path.substr(_layout.home().size() + 1));
     }
-    // A copied promise names the same content, and no two contents here are alike.
-    std::set<std::string> named;
-    for (const auto& [path, content] : seen()) {
-        if (path.starts_with("promise of ") && content != "nothing")
-            named.insert(content);
-    }
-    if (contents != named.size())
-        found.push_back("contents without a promise: " + std::to_string(contents - named.size()));
+    // Contents that no promise names.
+    std::ranges::set_difference(contents, named, std::back_inserter(found));
     return found;
 }
 
@@ -358,15 +381,39 @@ void SweepFixture::promise(const std::string& path, const std::string& content) 
     write(PromiseRecord::pathFor(at(path)), record.toJson());
 }
 
-std::string SweepFixture::behind(const std::string& promisePath) const
+void SweepFixture::writePackage(const std::string& path, const std::string& text)
+{
+    fs::create_directories(path + "/assets/empty");
+    write(path + "/text.md", text);
+    write(path + "/assets/" + text, text + ", and more of it");
+    fs::create_symlink("../text.md", path + "/assets/link");
+}
+
+/// Makes a package in the cloud, a part of which is in the cloud by itself.
+void SweepFixture::promisePackage() const
+{
+    promise(packagePromise, {});
+    const auto content = contentBehind(PromiseRecord::pathFor(at(packagePromise)));
+    fs::remove(content);
+    writePackage(content, "far");
+    PromiseRecord record, part;
+    record.kind = PromiseRecord::Kind::Package;
+    record.content = fs::path(content).filename().string();
+    write(PromiseRecord::pathFor(at(packagePromise)), record.toJson());
+    part.content = "content of a part";
+    write(_layout.cloud() + '/' + part.content, "part");
+    write(PromiseRecord::pathFor(content + "/part.txt"), part.toJson());
+}
+
+std::string SweepFixture::contentBehind(const std::string& promisePath) const
 {
     const auto record = host::drive::readPromise(promisePath);
-    const auto content = record ? record->content : std::string("damaged");
     for (const auto& folder : {_layout.cloud(), _layout.released()}) {
-        if (fs::is_regular_file(folder + '/' + content))
-            return read(folder + '/' + content);
+        const auto content = folder + '/' + (record ? record->content : std::string("damaged"));
+        if (fs::exists(content))
+            return content;
     }
-    return "nothing";
+    return {};
 }
 
 } // namespace sweep_tests

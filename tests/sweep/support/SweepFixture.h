@@ -31,7 +31,7 @@ void PrintTo(const Operation& operation, std::ostream* stream);
 std::vector<Operation> operations();
 
 /// The drive as a user sees it: every item by its path, a document with its content, a promise with the
-/// content behind it.
+/// content behind it, also what is in a package that is promised.
 using Drive = std::map<std::string, std::string>;
 
 /// A small drive with every kind of item, on which an operation runs.
@@ -92,7 +92,11 @@ private:
     std::vector<std::string> trashPlaces() const;
     bool isForOtherFileSystem(const FileCall& call) const;
     void promise(const std::string& path, const std::string& content) const;
-    std::string behind(const std::string& promisePath) const;
+    void addPromised(Drive& drive, const std::string& shown, const std::string& promisePath) const;
+    static void writePackage(const std::string& path, const std::string& text);
+    void promisePackage() const;
+    /// Answers the path of the content that a promise names; empty when there is none.
+    std::string contentBehind(const std::string& promisePath) const;
 };
 
 } // namespace sweep_tests

@@ -263,10 +263,10 @@ class EvictionStore : public LocalCloudStore {
 public:
     using LocalCloudStore::LocalCloudStore;
     host::system::SystemError store(
-        const DriveEntry& document, const ItemVersion& version, const std::string& content) override
+        const DriveEntry& document, const TreeVersions& versions, const std::string& content) override
     {
         beforeStore();
-        return LocalCloudStore::store(document, version, content);
+        return LocalCloudStore::store(document, versions, content);
     }
     std::function<void()> beforeStore;
 };
@@ -274,8 +274,9 @@ public:
 TEST_F(ItemChangesTest, AnEvictionThatFindsNoDocumentLeavesNoPromise)
 {
     const auto store = std::make_shared<EvictionStore>(layout());
-    LocalItemChanges evicting(layout(), store);
-    const auto item = writeDocument("a.txt", "text"), away = url("away.txt");
+    LocalItemChanges evicting(layout(), store, [](const auto&) { return true; });
+    auto item = writeDocument("a.txt", "text");
+    const auto away = url("away.txt");
     const auto evict = [&](const std::function<void()>& meanwhile) {
         store->beforeStore = meanwhile;
         EXPECT_TRUE(evicting.evictItem(item.path()));
@@ -288,6 +289,11 @@ TEST_F(ItemChangesTest, AnEvictionThatFindsNoDocumentLeavesNoPromise)
     evict([&] { writeDocument("a.txt", "saved meanwhile"); });
     EXPECT_EQ(contentOf(item.path()), "saved meanwhile");
     evict([&] { fs::remove(item.path()); });
+    // A package whose size is another one by now.
+    item =
+        writeDocument("package/inner/a.txt", "text").deletingLastPathComponent().deletingLastPathComponent();
+    evict([&] { writeDocument("package/inner/a.txt", "t"); });
+    EXPECT_EQ(contentOf(url("package/inner/a.txt")), "t");
 }
 
 TEST_F(ItemChangesTest, WhatBelongsToAPlaceThatCannotBeOpenedWaitsForIt)

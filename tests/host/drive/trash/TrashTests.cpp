@@ -395,6 +395,28 @@ TEST_F(TrashTest, AContentThatNothingStandsForIsListedAndComesBack)
     EXPECT_FALSE(hasTraces());
 }
 
+TEST_F(TrashTest, APackageThatNothingStandsForComesBackOrGoes)
+{
+    for (const char* name : {"a.textbundle", "b.textbundle"}) {
+        const auto package = url(name);
+        writeDocument(std::string(name) + "/assets/picture", "12345");
+        ASSERT_FALSE(services().fileChanges().evictItem(package.path()));
+        fs::remove(PromiseRecord::pathFor(package.path()));
+    }
+    const auto all = items();
+    ASSERT_THAT(all, SizeIs(2));
+    EXPECT_EQ(all[0].type, platform::FileType::Directory);
+    EXPECT_EQ(all[0].size, 5U);
+    const auto place = trash().restore(all[0].identifier, std::nullopt);
+    ASSERT_TRUE(place);
+    EXPECT_FALSE(trash().remove(all[1].identifier));
+    EXPECT_THAT(items(), IsEmpty());
+    cloud->items().download(Url::fileURL(*place), nullptr);
+    settle();
+    EXPECT_EQ(contentOf(*place.value + "/assets/picture"), "12345");
+    EXPECT_FALSE(hasTraces());
+}
+
 TEST_F(TrashTest, ARemovedContentStaysWhenAPromiseNamesItAfterAll)
 {
     writeContent("one");
