@@ -19,7 +19,7 @@ bool mayBeInCloud(const RowItem& item)
 
 bool mayBeHere(const RowItem& item)
 {
-    return !item.isPromise && (opensAsFolder(item.kind) || item.kind == FolderEntryKind::Document);
+    return !item.isPromise && item.kind != FolderEntryKind::Link;
 }
 
 void addEntry(kit::Menu& menu, std::string title,

@@ -20,9 +20,8 @@ struct DownloadVerbs {
 };
 
 /// Adds those entries to a menu that apply to one of the items at least. Nobody knows what a folder holds
-/// before it is read, so both apply to a folder. A package that is here is left alone, because it could
-/// not be opened without what it holds. A single item that is being downloaded gets the entry that cancels
-/// this.
+/// before it is read, so both apply to a folder. A single item that is being downloaded gets the entry that
+/// cancels this.
 void addDownloadEntries(kit::Menu& menu, const DownloadVerbs& verbs, const std::vector<RowItem>& items);
 
 } // namespace screens

@@ -15,9 +15,7 @@ namespace tarrow {
 namespace {
 
 using namespace testing_support;
-using platform::Url;
 using testing::ElementsAre;
-using testing::IsEmpty;
 
 class DownloadTest : public BrowserFixture {
 protected:
@@ -78,6 +76,26 @@ TEST_F(DownloadTest, DownloadsAreRemovedAndComeBack)
     EXPECT_THAT(offered("c.txt"), ElementsAre("Download"));
     choose(menuOf("c.txt"), "Download");
     EXPECT_EQ(contentOf(url("c.txt")), "c");
+    EXPECT_EQ(alert(), nullptr);
+}
+
+TEST_F(DownloadTest, APackageIsOneDocument)
+{
+    write("Trip/Notes.textbundle/text.md", "text"), write("Own.textbundle/text.md", "own");
+    write("Trip/a.txt", "a");
+    launch();
+    EXPECT_THAT(offered("Own.textbundle"), ElementsAre("Remove Download"));
+    browser->beginEditMode(nullptr);
+    topList()->setSelectedItems({url("Own.textbundle"), url("Trip")});
+    choose(topList()->optionsMenu(), "Remove Download");
+    EXPECT_THAT(takeNotices(), ElementsAre("3 downloads were removed"));
+    EXPECT_FALSE(isHere("Own.textbundle") || isHere("Trip/Notes.textbundle"));
+    choose(topList()->optionsMenu(), "Download");
+    EXPECT_EQ(contentOf(url("Own.textbundle/text.md")), "own");
+    EXPECT_EQ(contentOf(url("Trip/Notes.textbundle/text.md")), "text");
+    browser->endEditMode(nullptr);
+    choose(menuOf("Own.textbundle"), "Remove Download");
+    EXPECT_THAT(offered("Own.textbundle"), ElementsAre("Download"));
     EXPECT_EQ(alert(), nullptr);
 }
 
