@@ -117,6 +117,12 @@ std::vector<NavController::Screen> asScreens(const PreviewItemManager::ListStack
     return {lists.begin(), lists.end()};
 }
 
+/// A folder that is promised as a whole cannot be entered before it is downloaded.
+bool isFolderInCloud(const DRItem& item)
+{
+    return item.isDirectory() && item.isPromise();
+}
+
 Error vanished(const Url& url)
 {
     return Error(FileErrorCode::NoSuchFile,
@@ -329,7 +335,9 @@ void NavController::openPicked(const Url& url, const PickedItem& picked)
     }
     if (!picked.target)
         return tell(picked.refusal);
-    if (picked.target->isDirectory()) {
+    if (isFolderInCloud(*picked.target)) {
+        downloadItems({picked.target->url()});
+    } else if (picked.target->isDirectory()) {
         op.debug("Building DLC stack for symlink to %@", picked.target->url());
         openFolder(picked, op);
     } else {
@@ -397,12 +405,16 @@ void NavController::documentListControllerURLWasRemoved(const List& list)
 
 NavController::PeekedItem NavController::lookAtPeeked(const Url& url)
 {
-    constexpr std::array keys{
-        AttributeKey::IsPackage, AttributeKey::IsRegularFile, AttributeKey::IsDirectory};
+    constexpr std::array keys{AttributeKey::IsPackage, AttributeKey::IsRegularFile, AttributeKey::IsDirectory,
+        AttributeKey::DownloadingStatus};
     PeekedItem peeked{url, {}, {}};
     const auto values =
         services().cloudDocumentService().promisedItems().promisedItemResourceValues(url, keys).value;
-    if (values && (values->flag(AttributeKey::IsPackage) || values->flag(AttributeKey::IsRegularFile)))
+    const auto* status =
+        values ? values->get<platform::DownloadingStatus>(AttributeKey::DownloadingStatus) : nullptr;
+    const bool isInCloud = status && *status == platform::DownloadingStatus::NotDownloaded;
+    if (values
+        && (isInCloud || values->flag(AttributeKey::IsPackage) || values->flag(AttributeKey::IsRegularFile)))
         peeked.document = DRItem::initWithURL(url);
     else if (values && values->flag(AttributeKey::IsDirectory))
         peeked.folderTitle = screens::folderTitle(url);
@@ -485,6 +497,8 @@ void NavController::openPopped(const Url& url, const PickedItem& popped, bool is
     static constexpr Operation op{"-[NavController knopPopToURL:]"};
     if (!popped.item)
         return;
+    if (isFolderInCloud(*popped.item))
+        return downloadItems({url});
     if (popped.item->isDirectory()) {
         op.debug("Building DLC stack for Firmtap of %@", url);
         openFolder(popped, op);

@@ -255,7 +255,8 @@ std::vector<screens::TitledFolder> PreviewItemManager::foldersForURL(const Url& 
     static constexpr Operation op{"+[PreviewItemManager dlcStackForURL:]"};
     auto folder = url;
     auto item = DRItem::initWithURL(folder);
-    if (item && !item->isDirectory()) {
+    // A folder that is promised as a whole is shown in its place, because nobody can enter it.
+    if (item && (!item->isDirectory() || item->isPromise())) {
         folder = url.deletingLastPathComponent();
         item = DRItem::initWithURL(folder);
     }

@@ -97,14 +97,18 @@ kit::ListRow DocumentRowSource::rowAtIndex(const kit::ListView&, std::size_t ind
     const bool isKnown = known != _known.end();
     if (isKnown)
         complete(row, known->second.details);
+    const bool isFolderInCloud = isKnown && known->second.details.isFolderInCloud;
+    if (isFolderInCloud)
+        row.image = Image::named(folderIcon);
     if (row.download == kit::DownloadState::InCloud)
         showDownload(row, index);
     if (isKnown && known->second.thumbnail)
         row.image = known->second.thumbnail;
     if (_places)
         row.detail = joinedDetails(_places(_rows->url(index)), row.detail);
-    row.accessibleDescription = spokenDescription(
-        row, spokenKind(entry), isKnown ? known->second.details.tagNames : std::vector<std::string>());
+    row.accessibleDescription =
+        spokenDescription(row, isFolderInCloud ? localized("Folder") : spokenKind(entry),
+            isKnown ? known->second.details.tagNames : std::vector<std::string>());
     return row;
 }
 

@@ -20,7 +20,8 @@ namespace screens {
 namespace {
 
 constexpr AttributeKey detailKeys[] = {AttributeKey::LocalizedName, AttributeKey::ContentModificationDate,
-    AttributeKey::FileSize, AttributeKey::IsShared, AttributeKey::DownloadingStatus};
+    AttributeKey::FileSize, AttributeKey::IsShared, AttributeKey::DownloadingStatus,
+    AttributeKey::IsDirectory, AttributeKey::IsPackage};
 
 PromisedItems& promisedItems()
 {
@@ -77,6 +78,8 @@ void describe(RowDetails& details, const Url& url, FolderEntryKind kind, const A
     const auto* status = values.get<DownloadingStatus>(AttributeKey::DownloadingStatus);
     if (status && *status == DownloadingStatus::NotDownloaded)
         details.download = kit::DownloadState::InCloud;
+    details.isFolderInCloud = details.download == kit::DownloadState::InCloud
+        && values.flag(AttributeKey::IsDirectory) && !values.flag(AttributeKey::IsPackage);
     if (kind == FolderEntryKind::Document && details.download == kit::DownloadState::Present)
         details.modified = values.optional<Date>(AttributeKey::ContentModificationDate);
 }

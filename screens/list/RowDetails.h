@@ -21,6 +21,7 @@ struct RowDetails {
     std::string text; ///< date and size, or date and number of items, and whether it is shared
     kit::DownloadState download = kit::DownloadState::Present;
     std::vector<std::string> tagNames;
+    bool isFolderInCloud = false; ///< the folder itself is promised, which its name does not tell
     bool isContainer = false; ///< its content changes without a notice in its own folder
     std::optional<Date> modified; ///< of a downloaded document; its thumbnail shows this version
 

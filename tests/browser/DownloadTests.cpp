@@ -16,6 +16,7 @@ namespace {
 
 using namespace testing_support;
 using testing::ElementsAre;
+using testing::IsEmpty;
 
 class DownloadTest : public BrowserFixture {
 protected:
@@ -96,6 +97,28 @@ TEST_F(DownloadTest, APackageIsOneDocument)
     browser->endEditMode(nullptr);
     choose(menuOf("Own.textbundle"), "Remove Download");
     EXPECT_THAT(offered("Own.textbundle"), ElementsAre("Download"));
+    EXPECT_EQ(alert(), nullptr);
+}
+
+TEST_F(DownloadTest, AFolderInTheCloudIsDownloadedByATap)
+{
+    host::drive::PromiseRecord folder;
+    folder.kind = host::drive::PromiseRecord::Kind::Directory;
+    folder.content = "far";
+    writeFile(drive.layout().cloud() + "/far/a.txt", "a");
+    drive.writePromise("Far away", folder);
+    launch();
+    EXPECT_THAT(offered("Far away"), ElementsAre("Download"));
+    // A link to it leads to its place.
+    browser->warpToNewURLPreviewMode(url("Far away"), PreviewModeDetails);
+    settle();
+    EXPECT_EQ(browser->viewControllers().size(), 1U);
+    const auto& list = topList()->listView();
+    ASSERT_EQ(list->row(list->rowCount() - 1).title, "Far away");
+    list->activateRow(list->rowCount() - 1);
+    settle();
+    EXPECT_EQ(contentOf(url("Far away/a.txt")), "a");
+    EXPECT_THAT(takeNotices(), IsEmpty());
     EXPECT_EQ(alert(), nullptr);
 }
 

@@ -43,15 +43,21 @@ TEST_F(DocumentList, ShowsEveryKindOfItemWithItsDetails)
     farAway.size = 2'000'000;
     farAway.tags = {"Red", "Work"};
     drive.writePromise("Stuff/Far.pdf", farAway);
+    host::drive::PromiseRecord folder;
+    folder.kind = host::drive::PromiseRecord::Kind::Directory;
+    drive.writePromise("Stuff/Higher", folder);
     drive.mark(drive.writeDocument("Stuff/Ours.txt", "abc"), mark::shared, "1");
     drive.writeLink("Stuff/Pointer", "Notes.txt");
     drive.makeFolder("Stuff/Letter.pages");
-    drive.writeDocument("Stuff/bad\xFF\u202Egpj.exe");
+    // A byte that is no text, and a mark that turns what follows.
+    const auto bad = std::string("bad\xFF\xE2\x80") + "\xAEgpj.exe";
+    drive.writeDocument("Stuff/" + bad);
     const RowOfKind rows[] = {
         {{"Trip", Kind::Folder}, localizedPlural(".DICT.ITEMS.%d", {2}), kit::DownloadState::Present,
             kit::RowAccessory::Disclosure},
-        {{"bad\xFF\u202Egpj.exe"}, "7 bytes"},
+        {{bad}, "7 bytes"},
         {{"Far.pdf", Kind::Document, true}, "2 MB", kit::DownloadState::InCloud, kit::RowAccessory::None, 2},
+        {{"Higher", Kind::Document, true}, "", kit::DownloadState::InCloud},
         {{"Letter.pages", Kind::Package}, ""},
         {{"Notes.txt"}, "2 KB"},
         {{"Ours.txt"}, "3 bytes · Shared"},
@@ -79,6 +85,8 @@ TEST_F(DocumentList, ShowsEveryKindOfItemWithItsDetails)
         AllOf(StartsWith("Trip, Folder, "), HasSubstr(rows[0].detail)));
     EXPECT_THAT(list->listView()->row(2).accessibleDescription,
         AllOf(HasSubstr("Far.pdf"), HasSubstr("In the cloud"), HasSubstr("Work")));
+    EXPECT_EQ(list->listView()->row(3).accessibleDescription, "Higher, Folder, In the cloud");
+    EXPECT_EQ(list->listView()->row(3).image->iconName(), "folder");
 }
 
 TEST(DocumentRows, GivesEveryRowAnIdentifierOfItsOwn)
@@ -158,7 +166,8 @@ TEST_F(DocumentList, ShowsThumbnailsOfPicturesAndMakesThemAnewWhenTheyChange)
 {
     const auto writePicture = [&](int width, int height, unsigned char shade) {
         std::string picture = "P5 " + std::to_string(width) + ' ' + std::to_string(height) + " 255\n";
-        picture.append(static_cast<std::size_t>(width * height), static_cast<char>(shade));
+        picture.append(
+            static_cast<std::size_t>(width) * static_cast<std::size_t>(height), static_cast<char>(shade));
         const auto url = drive.writeDocument("Stuff/photo.pgm", picture);
         std::filesystem::last_write_time(
             url.path(), std::filesystem::file_time_type{std::chrono::hours(shade)});
