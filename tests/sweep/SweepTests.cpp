@@ -1,6 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
+#include "host/drive/records/PromiseFile.h"
 #include "tests/sweep/support/Reasons.h"
 #include "tests/sweep/support/SweepFixture.h"
 #include "tests/sweep/support/Tally.h"
@@ -11,10 +12,14 @@
 
 #include <cerrno>
 #include <cstring>
+#include <filesystem>
+#include <iterator>
 #include <set>
 #include <sstream>
 
 namespace {
+
+namespace fs = std::filesystem;
 
 using sweep_tests::Ending;
 using sweep_tests::Fault;
@@ -84,6 +89,49 @@ TEST_P(Sweep, AFailureOfAnyCallLeavesAllAsItWasOrAllDone)
     }
 }
 
+/// Every start removes what was released.
+class CollectionSweep : public sweep_tests::SweepFixture {
+protected:
+    /// Releases the package that is in the cloud, as its deletion does. Answers its place then.
+    std::string release() const
+    {
+        const auto promise = host::drive::PromiseRecord::pathFor(at("inner/far.textbundle"));
+        const auto content = host::drive::readPromise(promise).value->content;
+        fs::create_directories(_layout.released());
+        fs::rename(_layout.cloud() + '/' + content, _layout.released() + '/' + content);
+        fs::remove(promise);
+        return _layout.released() + '/' + content;
+    }
+    static std::ptrdiff_t itemsIn(const std::string& folder)
+    {
+        return std::distance(fs::recursive_directory_iterator(folder), {});
+    }
+};
+
+TEST_P(CollectionSweep, AKillLeavesNoHalfOfAPackageAsAContent)
+{
+    int kills = 0;
+    for (int point = 1, isKilled = 1; isKilled; ++point) {
+        makeDrive();
+        const auto content = release();
+        const auto whole = itemsIn(content);
+        int met = 0;
+        const auto ending = run([&](const FileCall& call) {
+            met += call.subject.find("/released/") != std::string::npos;
+            return Fault{.isKill = met == point};
+        });
+        isKilled = ending.wasKilled;
+        kills += isKilled;
+        SCOPED_TRACE("at call " + std::to_string(point) + " in the folder of released contents");
+        EXPECT_TRUE(!fs::exists(content) || itemsIn(content) == whole);
+        startAgain();
+        EXPECT_TRUE(fs::is_empty(_layout.released()));
+        EXPECT_THAT(leftovers(), testing::IsEmpty());
+    }
+    sweep_tests::tally().kills += kills;
+    EXPECT_GT(kills, 10);
+}
+
 std::set<std::string> listed(const std::string& said)
 {
     std::set<std::string> lines;
@@ -115,6 +163,9 @@ TEST_P(ListingSweep, AFailureOfAnyCallIsSaidUnlessTheListIsWhole)
         // A promise whose name is too long for its file is still left out when that name cannot be read.
         [](const FileCall& call) { return call.subject.find("/long") == std::string::npos; });
 }
+
+INSTANTIATE_TEST_SUITE_P(Operations, CollectionSweep,
+    testing::Values(sweep_tests::Operation{"list", {"list"}}), testing::PrintToStringParamName());
 
 INSTANTIATE_TEST_SUITE_P(Operations, ListingSweep, testing::Values(sweep_tests::Operation{"list", {"list"}}),
     testing::PrintToStringParamName());
