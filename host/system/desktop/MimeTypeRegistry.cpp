@@ -141,6 +141,8 @@ std::optional<std::string> MimeTypeRegistry::description(std::string_view type) 
         description = translated("Unknown kind");
     else if (text)
         description = text.get();
+    else if (_graph->conformsTo(type, platform::typeIdentifier::package))
+        description = translated("Package");
     _descriptions->add(type, description);
     return description;
 }

@@ -71,6 +71,7 @@ TEST_F(TypeRegistryTest, DescribesAndPictures)
     EXPECT_EQ(types.description("public.pdf"), "PDF document");
     EXPECT_EQ(types.description("dyn.mime.text/x-adasrc"), "Ada source code");
     EXPECT_EQ(types.description("public.data"), "Unknown kind");
+    EXPECT_EQ(types.description("public.text-bundle"), "Package");
     EXPECT_EQ(types.description("public.image"), std::nullopt);
     EXPECT_EQ(types.iconName("public.jpeg"), "image-x-generic");
     EXPECT_EQ(types.iconName("what.ever"), "text-x-generic");
