@@ -52,6 +52,12 @@ protected:
     {
         return mount(moment, [] {});
     }
+    /// Mounts a disk of another program on the device that was the drive's.
+    std::shared_ptr<MountedDisk> mountOther() const
+    {
+        sweep_tests::makeDiskImage(_images.at("other"));
+        return MountedDisk::mount(_images.at("other"), _elsewhere.path());
+    }
     void unmount()
     {
         while (!_mounted.empty())
@@ -116,6 +122,7 @@ private:
     }
 
     const testing_support::TemporaryDirectory _images{placeOfImages()};
+    const testing_support::TemporaryDirectory _elsewhere;
     const std::vector<std::string> _disks = GetParam().fileSystems == FileSystems::One
         ? std::vector<std::string>{"drive"}
         : std::vector<std::string>{"drive", "target"};
@@ -136,6 +143,8 @@ TEST_P(PowerCut, LosesNothingAtAnyMoment)
         const auto moments = runToTheEnd(others);
         const auto after = seen();
         unmount();
+        // The disks have other device numbers after the restart.
+        const auto other = mountOther();
         for (const auto& moment : moments) {
             SCOPED_TRACE(moment);
             ASSERT_TRUE(mountCopy(moment));

@@ -146,8 +146,7 @@ SystemResult<WorkRecord> WorkRecord::write(const DriveLayout& layout, const Plac
 std::string WorkRecord::versionText(const platform::ItemVersion& version)
 {
     std::string text;
-    for (const auto number :
-        {version.device, version.inode, version.size, static_cast<std::uint64_t>(version.modified)})
+    for (const auto number : {version.inode, version.size, static_cast<std::uint64_t>(version.modified)})
         text += std::to_string(number) + ' ';
     return text;
 }

@@ -32,6 +32,8 @@ public:
         std::string replaced = {}, replacing = {};
     };
     static constexpr const char* recordAttribute = "user.trw.work";
+    /// Answers the text of a version of the item. It does not name the device, because the disk may have
+    /// another number after a restart, and both versions lie in the item's folder.
     static std::string versionText(const platform::ItemVersion& version);
 
     /// The prefix of an item that was taken out of its folder and will be put back.
