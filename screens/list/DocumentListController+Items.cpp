@@ -195,6 +195,11 @@ kit::Menu DocumentListController::menuFor(const RowItem& item)
     kit::Menu menu;
     if (_editing)
         return menu;
+    if (isSearching())
+        menu.push_back({.title = localized("Show in Its Folder"),
+            .handler = weakly(this, &DocumentListController::open, item.url.deletingLastPathComponent(),
+                FolderEntryKind::Folder),
+            .image = {}});
     if (item.isPromise)
         addDownloadEntries(menu, _downloadVerbs, {item});
     for (const auto& entry : menuEntries) {

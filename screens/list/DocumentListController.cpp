@@ -288,10 +288,6 @@ void DocumentListController::startSearchWithQueryStringBecomeFirstResponder(
     view();
     _search = DocumentSearch::create({
         .chosen = weakly(this, &DocumentListController::open),
-        .showInFolder = weakly(this,
-            [](DocumentListController& self, const Url& url) {
-                self.open(url.deletingLastPathComponent(), FolderEntryKind::Folder);
-            }),
         .menu = weaklyOr(kit::Menu(), this, &DocumentListController::menuFor),
         .command = weaklyOr(false, this,
             [](DocumentListController& self, const RowItem& item, kit::RowCommand command) {

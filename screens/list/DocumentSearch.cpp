@@ -174,13 +174,7 @@ void DocumentSearch::rowActivated(kit::ListView&, std::size_t index)
 kit::Menu DocumentSearch::menuForRow(kit::ListView&, std::size_t index)
 {
     const auto item = itemAt(index);
-    if (!item)
-        return {};
-    auto show = weakly(this, [url = item->url](DocumentSearch& self) { self._handlers.showInFolder(url); });
-    auto menu = _handlers.menu(*item);
-    menu.insert(
-        menu.begin(), {.title = localized("Show in Its Folder"), .handler = std::move(show), .image = {}});
-    return menu;
+    return item ? _handlers.menu(*item) : kit::Menu();
 }
 
 std::optional<RowItem> DocumentSearch::itemAt(std::size_t index) const

@@ -35,7 +35,6 @@ public:
     /// The actions of the user on a result, and what else its list must know. None may be empty.
     struct Handlers {
         std::function<void(const Url& url, FolderEntryKind kind)> chosen;
-        std::function<void(const Url& url)> showInFolder;
         /// Answers the entries of a result's menu.
         std::function<kit::Menu(const RowItem& item)> menu;
         std::function<bool(const RowItem& item, kit::RowCommand command)> command;

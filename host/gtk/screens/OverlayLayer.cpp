@@ -11,6 +11,7 @@ namespace {
 
 constexpr int alertWidth = 340, sheetWidth = 640; ///< points, at most
 constexpr int edgeDistance = 12;
+constexpr int leastBackdrop = 44; ///< of the backdrop above a sheet, so that a finger can end it there
 constexpr unsigned fadeMilliseconds = 150;
 
 GtkWidget* makeClamp(GtkWidget* child, int width)
@@ -72,6 +73,7 @@ void OverlayLayer::place(LayerPlace layerPlace)
     case LayerPlace::Bottom:
         gtk_widget_set_valign(_card, GTK_ALIGN_END);
         setMargins(_card, edgeDistance);
+        gtk_widget_set_margin_top(_card, leastBackdrop);
         placed = makeClamp(_card, sheetWidth);
         break;
     case LayerPlace::Sheet:

@@ -281,6 +281,13 @@ TEST_F(DocumentList, SearchesTheWholeDriveAndSaysWhereItemsLie)
         actions.push_back("action " + std::to_string(action) + " trip plan.txt");
     EXPECT_EQ(delegate->take(), actions);
 
+    delegate->preview = std::make_shared<kit::ViewController>();
+    EXPECT_TRUE(results->holdRow(plan));
+    drive.dispatch->runUntilIdle();
+    const auto peek = std::dynamic_pointer_cast<kit::AlertController>(search->presentedViewController());
+    ASSERT_TRUE(peek);
+    EXPECT_EQ(peek->actions()[1]->title(), "Show in Its Folder");
+
     search->userEditedQuery("");
     drive.dispatch->runUntilIdle();
     EXPECT_EQ(results->rowCount(), 0U);
