@@ -13,7 +13,6 @@
 
 using namespace platform;
 using namespace screens;
-using testing::ElementsAre;
 using namespace testing_support;
 
 namespace {
