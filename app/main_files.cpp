@@ -5,7 +5,10 @@
 #include "host/system/coordination/LocalFileCoordinator.h"
 #include "host/system/desktop/JournalLogSink.h"
 #include "host/system/desktop/MimeTypeRegistry.h"
+#include "host/system/files/ItemPaths.h"
 #include "host/system/files/PosixFileSystem.h"
+#include "host/system/files/PromisedNames.h"
+#include "host/system/files/SystemErrors.h"
 #include "host/system/queues/GLibDispatch.h"
 #include "items/DocumentID.h"
 #include "items/FileUtils.h"
@@ -17,6 +20,7 @@
 #include "platform/NotificationCenter.h"
 #include "platform/Trash.h"
 
+#include <cerrno>
 #include <cstdio>
 #include <future>
 #include <map>
@@ -178,15 +182,16 @@ int tag(const Url& url, const std::vector<Url>& tags)
 int list(const Url& folder)
 {
     using Continue = platform::FileSystem::Continue;
-    auto& promised = platform::services().cloudDocumentService().promisedItems();
     std::map<std::string, const char*> kinds;
     std::optional<platform::Error> failed;
     platform::services().fileSystem().enumerateDeeply(
         folder,
         [&](const Url& item, platform::FileType type) {
-            const auto logical = promised.logicalURLForPromise(item);
-            if (logical != item)
-                kinds.emplace(logical.path(), "promise");
+            const auto name = host::system::promisedName(item.path());
+            if (!name && !name.error.is(EBADMSG) && !name.error.is(ENOENT))
+                failed = host::system::systemError(name.error, item.path());
+            if (name)
+                kinds.emplace(host::system::siblingPath(item.path(), *name), "promise");
             else if (!item.lastPathComponent().starts_with('.'))
                 kinds.insert_or_assign(item.path(), kindName(type));
             return Continue::Yes;

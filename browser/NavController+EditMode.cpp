@@ -192,6 +192,11 @@ void NavController::updateStatusUI(const List& list)
         _barButtonDeleteItem->setEnabled(isKnown && MenuEnableChecks::canShowDeleteForSelectedItems(*shown));
 }
 
+void NavController::driveIsPutRight()
+{
+    updateStatusUI(nullptr);
+}
+
 void NavController::beginEditMode(const Sender&)
 {
     static constexpr Operation op{"-[NavController beginEditMode:]"};
@@ -251,6 +256,8 @@ void NavController::documentListControllerRequestsEditing(const List& list)
 
 std::string NavController::toolbarStatusText(std::size_t itemCount) const
 {
+    if (services().cloudDocumentService().isPuttingRight())
+        return platform::localized("Putting things right…");
     auto items = platform::localizedPlural(".DICT.ITEMS.%d", {static_cast<std::int64_t>(itemCount)});
     if (!okToShowQuota())
         return items;

@@ -82,6 +82,8 @@ void NavController::observeAccount()
         Notification::ApplicationDidBecomeActive, weakly(this, &NavController::didBecomeActiveNotification)));
     _observations.push_back(
         center.observe(Notification::TrashDidChange, weakly(this, &NavController::countTrash)));
+    _observations.push_back(
+        center.observe(Notification::PuttingRightDidChange, weakly(this, &NavController::driveIsPutRight)));
     _observations.push_back(center.observe(Notification::CloudIdentityDidChange,
         weakly(this, &NavController::tarrowAccountAvailabilityChanged)));
 }

@@ -137,7 +137,9 @@ public:
     void configureToolbar(const List& list);
     /// Brings the status line of a list (null: the one on top) up to date.
     void updateStatusUI(const List& list);
-    /// Answers a text with the number of items and, once it is known, the free storage.
+    void driveIsPutRight();
+    /// Answers a text with the number of items and, once it is known, the free storage; in their place that
+    /// the drive is put right, while it is.
     std::string toolbarStatusText(std::size_t itemCount) const;
     std::string quotaAvailableString() const;
     bool okToShowQuota() const { return _lastQuotaFetch.has_value(); }

@@ -30,6 +30,11 @@ public:
     virtual DocumentIdentifiers& documentIdentifiers() = 0;
     /// Access to locations that the system grants for a while only.
     virtual SecurityScopedAccess& securityScopedAccess() = 0;
+
+    /// Whether the drive still completes or takes back what programs were doing when they were killed. It is
+    /// true only for work of more than half a second. Notification::PuttingRightDidChange is posted whenever
+    /// the answer changes. Main thread.
+    virtual bool isPuttingRight() const = 0;
 };
 
 } // namespace platform

@@ -21,6 +21,8 @@ enum class Notification {
     CloudIdentityDidChange, ///< another account, or none, is signed in; see CloudAccount
     StorageOfferDidChange, ///< there is another offer, or none any more; see StorageOfferManager
     DownloadsDidChange, ///< a download began, got on or ended; user information: "url", the document's
+    PuttingRightDidChange, ///< the drive puts right what was interrupted, or has done so; see
+                           ///< CloudDocumentService
     TrashDidChange, ///< something came into the trash or left it; see Trash
     ActivityOffersDidChange, ///< other devices offer other activities; see ActivityHandOver
     KeyValueStoreDidChangeExternally, ///< another program changed the values; see KeyValueStore

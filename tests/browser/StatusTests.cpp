@@ -45,6 +45,17 @@ TEST_F(StatusTest, TheLineHasTheItemsAndOnceItIsKnownTheFreeStorage)
     EXPECT_EQ(statusText(), itemsText(topList()->containedItemCount()) + ", 3 GB available");
 }
 
+TEST_F(StatusTest, TheLineSaysThatTheDriveIsPutRight)
+{
+    cloud->putsRight = true;
+    launch();
+    EXPECT_EQ(statusText(), "Putting things right…");
+    cloud->putsRight = false;
+    post(Notification::PuttingRightDidChange);
+    EXPECT_EQ(statusText(), browser->toolbarStatusText(topList()->containedItemCount()));
+    EXPECT_NE(statusText(), "Putting things right…");
+}
+
 TEST_F(StatusTest, TheOfferAtLaunchIsTakenUnlessItIsStillBeingFetched)
 {
     offers->offer = SimulatedOffers::make(4, true);

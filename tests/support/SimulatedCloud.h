@@ -23,6 +23,7 @@ public:
     std::optional<platform::PropertyValue> token = platform::PropertyValue("account-1");
     platform::Result<std::int64_t> quota = std::int64_t{1000};
     mutable int requests = 0;
+    bool putsRight = false;
     int looksAtItems = 0; ///< how often an item's attributes were asked for
     std::function<void()> beforeAnswer; ///< called while a quota request is pending
 
@@ -42,6 +43,8 @@ public:
     {
         return _documents->securityScopedAccess();
     }
+
+    bool isPuttingRight() const override { return putsRight; }
 
     std::optional<platform::PropertyValue> identityToken() const override { return token; }
     std::optional<platform::PropertyValue> knownIdentityToken() const override { return token; }

@@ -111,8 +111,9 @@ SystemResult<std::vector<std::string>> foldersIn(const FileDescriptor& folder)
     std::vector<std::string> names;
     const auto reader = std::make_unique<system::DirectoryReader>(folder);
     while (const auto entry = reader->next()) {
-        const auto type = entry->type ? entry->type : system::typeOfEntry(folder, entry->name);
-        if (type == platform::FileType::Directory)
+        // What cannot be told is taken for a folder, whose walk then says what is wrong.
+        const auto type = reader->typeOf(*entry);
+        if (type == platform::FileType::Directory || type == platform::FileType::Other)
             names.emplace_back(entry->name);
     }
     if (reader->error())

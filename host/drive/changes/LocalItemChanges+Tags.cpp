@@ -64,8 +64,10 @@ SystemResult<TaggedItem> openItem(const DriveEntry& entry)
         return SystemError::last();
     if (!S_ISREG(found.st_mode) && !S_ISDIR(found.st_mode))
         return SystemError(ENOTSUP);
-    auto tags = splitTags(AttributeReader(file).value(itemMark::tags).value_or(std::string()));
-    return TaggedItem{std::move(file), std::move(tags)};
+    const auto tags = AttributeReader(file).value(itemMark::tags);
+    if (!tags)
+        return tags.error;
+    return TaggedItem{std::move(file), splitTags(tags->value_or(std::string()))};
 }
 
 SystemResult<TaggedItem> openTaggedPromise(const DriveEntry& entry)

@@ -43,7 +43,10 @@ SystemError copyPromise(const FileDescriptor& from, const FileDescriptor& to)
     const AttributeReader attributes(from);
     for (const char* name : {itemMark::promise, itemMark::type, system::promisedNameAttribute}) {
         const auto value = attributes.value(name);
-        if (value && ::fsetxattr(to.get(), name, value->data(), value->size(), 0) != 0)
+        if (!value)
+            return value.error;
+        const auto& text = *value;
+        if (text && ::fsetxattr(to.get(), name, text->data(), text->size(), 0) != 0)
             return SystemError::last(name);
     }
     return {};
@@ -61,10 +64,12 @@ SystemError finish(const FileDescriptor& from, const FileDescriptor& to, const s
     return SystemError::unless(::futimens(to.get(), times) == 0 && ::fsync(to.get()) == 0);
 }
 
-/// Answers whether two files hold the same promise, or none.
+/// Answers whether two files hold the same promise, or none; not when that cannot be read.
 bool isSamePromise(const FileDescriptor& a, const FileDescriptor& b)
 {
-    return AttributeReader(a).value(itemMark::promise) == AttributeReader(b).value(itemMark::promise);
+    const auto first = AttributeReader(a).value(itemMark::promise);
+    const auto second = AttributeReader(b).value(itemMark::promise);
+    return first && second && *first == *second;
 }
 
 using Piece = std::array<char, 64 * 1024>;

@@ -91,11 +91,13 @@ bool giveName(const FileDescriptor& file, const std::string& path)
     return ::linkat(AT_FDCWD, descriptorPath(file).c_str(), AT_FDCWD, path.c_str(), AT_SYMLINK_FOLLOW) == 0;
 }
 
-std::string textIn(const FileDescriptor& file, const std::string& path)
+/// Answers nothing when the text cannot be read, because work may have begun then.
+std::optional<std::string> textIn(const FileDescriptor& file, const std::string& path)
 {
-    if (auto text = AttributeReader(file).value(WorkRecord::recordAttribute))
-        return std::move(*text);
-    return readSmallFile(file, path, largestRecord).value.value_or(std::string());
+    auto text = AttributeReader(file).value(WorkRecord::recordAttribute);
+    if (!text)
+        return std::nullopt;
+    return *text ? std::move(*text) : readSmallFile(file, path, largestRecord).value;
 }
 
 /// Answers whether a file is so old that whoever made it has locked it, or has ended.
@@ -171,7 +173,10 @@ void WorkRecord::forEachAbandoned(const DriveLayout& layout, const std::function
         const FileDescriptor file(::open(path.c_str(), O_RDWR | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC));
         if (!file || !lockWhole(file, F_OFD_SETLK))
             continue; // its process still works
-        const auto places = placesOf(textIn(file, path));
+        const auto text = textIn(file, path);
+        if (!text)
+            continue;
+        const auto places = placesOf(*text);
         // A record without text may belong to a living process that has not locked it yet.
         if (places.working.empty() ? isOld(file) : settle(places))
             ::unlink(path.c_str());

@@ -6,6 +6,7 @@
 #include "host/drive/records/BeneathRoot.h"
 #include "host/drive/records/ItemFacts.h"
 #include "host/drive/records/PromiseFile.h"
+#include "host/drive/records/SmallFile.h"
 #include "host/system/files/ItemPaths.h"
 
 #include <fcntl.h>
@@ -46,12 +47,12 @@ SystemResult<IdentifiedItem> IdentifiedItem::open(const DriveLayout& layout, con
     return item;
 }
 
-std::uint32_t IdentifiedItem::identifier() const
+SystemResult<std::uint32_t> IdentifiedItem::identifier() const
 {
     if (!_isPromise)
         return documentIdentifierOf(_file);
     const auto promise = readPromise(_file);
-    return promise ? promise->documentIdentifier : 0;
+    return promise ? SystemResult<std::uint32_t>(promise->documentIdentifier) : promise.error;
 }
 
 bool IdentifiedItem::canCarryIdentifier() const
@@ -82,7 +83,9 @@ Result<platform::DocumentIdentifiers::OpenFile::Attributes> IdentifiedItem::attr
     // Nothing is told about items elsewhere, not even that they exist.
     if (!path.starts_with(_layout.documents() + '/'))
         return failed(EXDEV);
-    return Attributes{identifier(), platform::Url::fileURL(path)};
+    const auto number = identifier();
+    return number ? Attributes{*number, platform::Url::fileURL(path)}
+                  : Result<Attributes>(itemError(number.error, path));
 }
 
 std::uint32_t identifierAt(const std::string& physicalPath)

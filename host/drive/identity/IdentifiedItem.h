@@ -20,8 +20,10 @@ public:
     /// Opens the item at a path below the drive's home, else its promise, without following a link.
     static system::SystemResult<IdentifiedItem> open(const DriveLayout& layout, const std::string& path);
 
-    /// Answers the identifier that the item carries; 0 for none, and for a promise that cannot be read.
-    std::uint32_t identifier() const;
+    /// Answers the identifier that the item carries; 0 for none. An error says nothing about that.
+    system::SystemResult<std::uint32_t> identifier() const;
+    /// Answers whether it carries this identifier, as far as can be read.
+    bool carries(std::uint32_t identifier) const { return this->identifier().value == identifier; }
     /// Answers whether this is a file or a folder, or the promise of one. Nothing else can carry an
     /// identifier.
     bool canCarryIdentifier() const;

@@ -70,7 +70,10 @@ Result<std::uint32_t> LocalDocumentIdentifiers::identifyLocked(const std::string
         rebuild();
     if (_index.prepareForWriting() != DocumentIndex::State::Complete)
         return itemError(_index.failure(), path);
-    const auto identifier = item->identifier();
+    const auto carried = item->identifier();
+    if (!carried)
+        return itemError(carried.error, path);
+    const auto identifier = *carried;
     const auto answer = _index.lookUp(identifier, IndexDatabase::Use::Writing);
     if (answer.kind == Kind::Unreadable)
         return itemError(_index.failure(), path);

@@ -142,7 +142,7 @@ std::optional<DocumentPlace> LocalDocumentIdentifiers::locate(const IdentifiedPl
     if (isPlainRelativePath(known.place.path)) {
         // The document may have been saved by replacing it. A copy may also lie in its old place.
         const auto item = IdentifiedItem::open(_layout, known.place.path);
-        if (item && item->identifier() == known.identifier && item->attributes())
+        if (item && item->carries(known.identifier) && item->attributes())
             best = item->place();
         if (best && known.place.inode == 0)
             return best;
@@ -218,7 +218,7 @@ void LocalDocumentIdentifiers::correct(std::uint32_t identifier, const std::stri
 {
     const auto relative = relativePath(path);
     const auto item = relative ? IdentifiedItem::open(_layout, *relative) : system::SystemError(ENOENT, path);
-    if (!item || item->identifier() != identifier)
+    if (!item || !item->carries(identifier))
         return;
     const auto answer = _index.lookUp(identifier);
     if (answer.kind == Kind::Removed || (answer.kind == Kind::Known && answer.place == item->place()))
@@ -239,7 +239,7 @@ void LocalDocumentIdentifiers::moved(const std::string& from, const std::string&
         return;
     _index.noteMove(*source, *target);
     const auto item = IdentifiedItem::open(_layout, *target);
-    const auto identifier = item ? item->identifier() : 0;
+    const auto identifier = item ? item->identifier().value.value_or(0) : 0;
     const auto answer = identifier != 0 ? _index.lookUp(identifier) : DocumentIndex::Answer();
     // A move to another file system makes another file of the item.
     if (answer.kind == Kind::Known && answer.place.path == *target && answer.place != item->place())

@@ -67,7 +67,7 @@ void describeFile(ItemFacts& facts, const std::string& path, const SystemError& 
     }
     facts.presence = ItemFacts::Presence::Here;
     if (hasMarks(facts.status))
-        facts.marks = ItemMarks::read(path);
+        facts.marks = ItemMarks::glimpse(AttributeReader(path));
 }
 
 } // namespace
@@ -121,7 +121,7 @@ ItemFacts lookAtOpenFile(const host::system::FileDescriptor& file)
     }
     facts.presence = ItemFacts::Presence::Here;
     if (hasMarks(facts.status))
-        facts.marks = ItemMarks::read(AttributeReader(file), {});
+        facts.marks = ItemMarks::glimpse(AttributeReader(file));
     return facts;
 }
 

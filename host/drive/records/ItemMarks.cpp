@@ -19,6 +19,7 @@ namespace host::drive {
 
 using host::system::FileDescriptor;
 using host::system::SystemError;
+using host::system::SystemResult;
 using platform::DownloadingStatus;
 using platform::SharedItemRole;
 
@@ -28,18 +29,20 @@ constexpr std::size_t largestAttribute = 64 * 1024; // the kernel's own limit
 
 /// Calls a function of the kernel with a small buffer, and with one of the largest size when that is needed.
 template <typename Call>
-std::optional<std::string> readWith(const Call& call)
+SystemResult<std::string> readWith(const Call& call)
 {
     std::array<char, 1024> small;
     auto length = call(small.data(), small.size());
     if (length >= 0)
         return std::string(small.data(), static_cast<std::size_t>(length));
     if (errno != ERANGE)
-        return std::nullopt;
+        return SystemError::last();
     std::string large(largestAttribute, '\0');
     length = call(large.data(), large.size());
-    large.resize(length < 0 ? 0 : static_cast<std::size_t>(length));
-    return length < 0 ? std::nullopt : std::optional(std::move(large));
+    if (length < 0)
+        return SystemError::last();
+    large.resize(static_cast<std::size_t>(length));
+    return large;
 }
 
 template <typename Number>
@@ -62,25 +65,37 @@ std::optional<DownloadingStatus> statusNamed(std::string_view name)
     return name == "downloaded" ? std::optional(DownloadingStatus::Downloaded) : std::nullopt;
 }
 
-void readMark(ItemMarks& marks, const AttributeReader& item, std::string_view name)
+/// Answers whether a file system, or this kind of file, has no attributes of users.
+bool saysNone(const SystemError& error)
 {
-    // The names come from a list of the kernel's, in which each ends with a null character.
-    // NOLINTNEXTLINE(bugprone-suspicious-stringview-data-usage)
-    const auto value = [&] { return item.value(name.data()).value_or(std::string()); };
+    return error.is(ENODATA) || error.is(EOPNOTSUPP);
+}
+
+bool isMark(std::string_view name)
+{
+    static constexpr std::array names{std::string_view(itemMark::tags), std::string_view(itemMark::status),
+        std::string_view(itemMark::documentIdentifier), std::string_view(itemMark::shared),
+        std::string_view(itemMark::role), std::string_view(host::system::hiddenExtensionAttribute),
+        std::string_view(itemMark::created)};
+    return std::ranges::find(names, name) != names.end();
+}
+
+void setMark(ItemMarks& marks, std::string_view name, const std::string& value)
+{
     if (name == itemMark::tags)
-        marks.tags = splitTags(value());
+        marks.tags = splitTags(value);
     else if (name == itemMark::status)
-        marks.status = statusNamed(value());
+        marks.status = statusNamed(value);
     else if (name == itemMark::documentIdentifier)
-        marks.documentIdentifier = identifier(value());
+        marks.documentIdentifier = identifier(value);
     else if (name == itemMark::shared)
-        marks.shared = value() == "1";
+        marks.shared = value == "1";
     else if (name == itemMark::role)
-        marks.role = roleNamed(value());
+        marks.role = roleNamed(value);
     else if (name == host::system::hiddenExtensionAttribute)
-        marks.extensionHidden = value() == "1";
+        marks.extensionHidden = value == "1";
     else if (name == itemMark::created) {
-        if (const auto nanoseconds = numberIn<std::int64_t>(value()))
+        if (const auto nanoseconds = numberIn<std::int64_t>(value))
             marks.created = platform::Date{*nanoseconds};
     }
 }
@@ -102,26 +117,50 @@ AttributeReader::AttributeReader(const FileDescriptor& item)
 {
 }
 
-std::optional<std::string> AttributeReader::value(const char* name) const
+SystemResult<std::optional<std::string>> AttributeReader::value(const char* name) const
 {
-    return readWith([&](char* into, std::size_t size) { return _get(_path.c_str(), name, into, size); });
+    auto value =
+        readWith([&](char* into, std::size_t size) { return _get(_path.c_str(), name, into, size); });
+    if (!value && !saysNone(value.error))
+        return value.error;
+    return std::move(value.value);
 }
 
-std::string AttributeReader::names() const
+SystemResult<std::string> AttributeReader::names() const
 {
-    return readWith([&](char* into, std::size_t size) {
-        return _list(_path.c_str(), into, size);
-    }).value_or(std::string());
+    auto names = readWith([&](char* into, std::size_t size) { return _list(_path.c_str(), into, size); });
+    return !names && saysNone(names.error) ? std::string() : std::move(names);
 }
 
-ItemMarks ItemMarks::read(const AttributeReader& item, ItemMarks before)
+SystemError ItemMarks::update(const AttributeReader& item)
 {
-    auto marks = std::move(before);
+    SystemError failure;
     const auto names = item.names();
-    for (const char* name = names.data(); name < names.data() + names.size(); name += std::strlen(name) + 1) {
-        if (std::string_view(name).starts_with("user."))
-            readMark(marks, item, name);
+    if (!names)
+        return names.error;
+    for (const char* name = names->data(); name < names->data() + names->size();
+         name += std::strlen(name) + 1) {
+        if (!isMark(name))
+            continue;
+        const auto value = item.value(name);
+        if (!value)
+            failure = value.error;
+        else if (*value)
+            setMark(*this, name, **value);
     }
+    return failure;
+}
+
+SystemResult<ItemMarks> ItemMarks::read(const AttributeReader& item, ItemMarks before)
+{
+    TRW_TRY(before.update(item));
+    return before;
+}
+
+ItemMarks ItemMarks::glimpse(const AttributeReader& item)
+{
+    ItemMarks marks;
+    static_cast<void>(marks.update(item));
     return marks;
 }
 
@@ -160,7 +199,7 @@ std::vector<std::string> splitTags(std::string_view text)
 std::vector<std::string> tagsAt(const std::string& path, bool isPromise)
 {
     if (!isPromise)
-        return splitTags(AttributeReader(path).value(itemMark::tags).value_or(std::string()));
+        return ItemMarks::glimpse(AttributeReader(path)).tags;
     auto promise = readPromise(PromiseRecord::pathFor(path));
     return promise ? std::move(promise.value->tags) : std::vector<std::string>();
 }
@@ -176,14 +215,16 @@ SystemError writeTags(const FileDescriptor& item, const std::vector<std::string>
     return SystemError::unless(hasNone);
 }
 
-std::uint32_t documentIdentifierOf(const FileDescriptor& item)
+SystemResult<std::uint32_t> documentIdentifierOf(const FileDescriptor& item)
 {
-    return identifier(AttributeReader(item).value(itemMark::documentIdentifier));
+    const auto text = AttributeReader(item).value(itemMark::documentIdentifier);
+    return text ? SystemResult<std::uint32_t>(identifier(*text)) : text.error;
 }
 
 std::uint32_t documentIdentifierAt(const std::string& path)
 {
-    return identifier(AttributeReader(path).value(itemMark::documentIdentifier));
+    const auto text = AttributeReader(path).value(itemMark::documentIdentifier);
+    return text ? identifier(*text) : 0;
 }
 
 } // namespace host::drive

@@ -26,11 +26,12 @@ public:
     /// Reads those of an open item, which may be opened with O_PATH.
     explicit AttributeReader(const system::FileDescriptor& item);
 
-    /// Answers the value of an attribute, or nothing when the item has none of this name or it cannot be
-    /// read.
-    std::optional<std::string> value(const char* name) const;
-    /// Answers the names of all attributes, each ended by a null character; empty when they cannot be read.
-    std::string names() const;
+    /// Answers the value of an attribute, or nothing when the item has none of this name. An attribute that
+    /// cannot be read is an error, because it may well be there.
+    system::SystemResult<std::optional<std::string>> value(const char* name) const;
+    /// Answers the names of all attributes, each ended by a null character; empty where the file system has
+    /// no attributes.
+    system::SystemResult<std::string> names() const;
 
 private:
     std::string _path;
@@ -50,10 +51,15 @@ struct ItemMarks {
     /// download.
     std::optional<platform::Date> created;
 
-    /// Reads them; a malformed attribute counts as missing. It costs one system call for an item without
-    /// attributes. A mark without an attribute stays as it is in `before`.
-    static ItemMarks read(const AttributeReader& item, ItemMarks before);
-    static ItemMarks read(const std::string& path) { return read(AttributeReader(path), {}); }
+    /// Reads them; a malformed attribute counts as missing, and one that cannot be read is an error. It costs
+    /// one system call for an item without attributes. A mark without an attribute stays as it is in
+    /// `before`.
+    static system::SystemResult<ItemMarks> read(const AttributeReader& item, ItemMarks before);
+    /// Reads those that can be read, for a look that changes nothing.
+    static ItemMarks glimpse(const AttributeReader& item);
+
+private:
+    system::SystemError update(const AttributeReader& item);
 };
 
 /// The names of the extended attributes. The one that hides the extension is
@@ -89,8 +95,9 @@ system::SystemError writeTags(const system::FileDescriptor& item, const std::vec
 
 /// Answers the document identifier that an open item carries; 0 for none. The descriptor may be opened with
 /// O_PATH.
-std::uint32_t documentIdentifierOf(const system::FileDescriptor& item);
-/// Answers the document identifier of the item at a path, without following a link at its end.
+system::SystemResult<std::uint32_t> documentIdentifierOf(const system::FileDescriptor& item);
+/// Answers the document identifier of the item at a path, without following a link at its end; 0 for none,
+/// and when it cannot be read.
 std::uint32_t documentIdentifierAt(const std::string& path);
 
 } // namespace host::drive

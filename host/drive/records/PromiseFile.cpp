@@ -28,32 +28,52 @@ using platform::Result;
 namespace {
 
 /// Answers the promise with the marks that its file has.
-PromiseRecord marked(PromiseRecord promise, const AttributeReader& file)
+SystemResult<PromiseRecord> marked(PromiseRecord promise, const AttributeReader& file)
 {
-    auto marks = ItemMarks::read(file,
-        {promise.shared, promise.role, promise.extensionHidden, {}, promise.documentIdentifier,
-            std::move(promise.tags), promise.created});
-    promise.shared = marks.shared;
-    promise.role = marks.role;
-    promise.extensionHidden = marks.extensionHidden;
-    promise.documentIdentifier = marks.documentIdentifier;
-    promise.tags = std::move(marks.tags);
-    promise.created = marks.created;
+    ItemMarks marks;
+    marks.shared = promise.shared;
+    marks.role = promise.role;
+    marks.extensionHidden = promise.extensionHidden;
+    marks.documentIdentifier = promise.documentIdentifier;
+    marks.tags = std::move(promise.tags);
+    marks.created = promise.created;
+    auto read = ItemMarks::read(file, std::move(marks));
+    if (!read)
+        return read.error;
+    promise.shared = read->shared;
+    promise.role = read->role;
+    promise.extensionHidden = read->extensionHidden;
+    promise.documentIdentifier = read->documentIdentifier;
+    promise.tags = std::move(read->tags);
+    promise.created = read->created;
     return promise;
 }
 
-/// Answers nothing for a file without the attribute.
-std::optional<Result<PromiseRecord>> readShortForm(const AttributeReader& file, const std::string& path)
+/// Answers a promise that is an attribute, or nothing for a file without one. Both this function and
+/// readJson() answer EBADMSG, with the reason for the log, for what is no promise.
+std::optional<SystemResult<PromiseRecord>> readShortForm(const AttributeReader& file)
 {
     const auto form = file.value(itemMark::promise);
     if (!form)
+        return form.error;
+    if (!*form)
         return std::nullopt;
-    auto promise = PromiseRecord::parseShortForm(*form);
+    auto promise = PromiseRecord::parseShortForm(**form);
     if (!promise)
-        return damagedRecord(path, "its attribute holds no promise");
-    if (auto type = file.value(itemMark::type))
-        promise->type = std::move(*type);
+        return SystemError(EBADMSG, "its attribute holds no promise");
+    auto type = file.value(itemMark::type);
+    if (!type)
+        return type.error;
+    if (*type)
+        promise->type = std::move(**type);
     return marked(std::move(*promise), file);
+}
+
+SystemResult<PromiseRecord> readJson(const std::string& text, const AttributeReader& file)
+{
+    auto promise = PromiseRecord::parse(text);
+    return promise ? marked(std::move(*promise), file)
+                   : SystemResult<PromiseRecord>(SystemError(EBADMSG, "it does not hold a promise"));
 }
 
 /// Writes no empty attribute.
@@ -61,16 +81,6 @@ SystemError writeAttribute(const FileDescriptor& file, const char* name, const s
 {
     return SystemError::unless(
         value.empty() || ::fsetxattr(file.get(), name, value.data(), value.size(), 0) == 0, name);
-}
-
-Result<PromiseRecord> readJson(Result<std::string> text, const AttributeReader& file, const std::string& path)
-{
-    if (!text)
-        return *text.error;
-    auto promise = PromiseRecord::parse(*text);
-    if (!promise)
-        return damagedRecord(path, "it does not hold a promise");
-    return marked(std::move(*promise), file);
 }
 
 } // namespace
@@ -85,23 +95,31 @@ Result<PromiseRecord> readPromise(const std::string& path)
             return itemError(name.error, path);
     }
     const AttributeReader file(path);
-    if (auto promise = readShortForm(file, path))
-        return std::move(*promise);
-    return readJson(readSmallFile(path, PromiseRecord::maximumFileSize), file, path);
+    auto promise = readShortForm(file);
+    if (!promise) {
+        const auto text = readSmallFile(path, PromiseRecord::maximumFileSize);
+        if (!text)
+            return *text.error;
+        promise = readJson(*text, file);
+    }
+    if (*promise)
+        return std::move(*promise->value);
+    const auto& failure = promise->error;
+    return failure.is(EBADMSG) ? damagedRecord(path, failure.about()) : itemError(failure, path);
 }
 
 SystemResult<PromiseRecord> readPromise(const FileDescriptor& file)
 {
     const AttributeReader attributes(file);
-    auto promise = readShortForm(attributes, {});
-    if (!promise && ::lseek(file.get(), 0, SEEK_SET) != 0)
+    if (auto promise = readShortForm(attributes))
+        return std::move(*promise);
+    if (::lseek(file.get(), 0, SEEK_SET) != 0)
         return SystemError::last();
-    if (!promise)
-        promise = readJson(readSmallFile(file, {}, PromiseRecord::maximumFileSize), attributes, {});
-    if (*promise)
-        return std::move(*promise->value);
-    const bool isDamaged = promise->error->domain() == platform::errorDomain::cloud;
-    return SystemError(isDamaged ? EBADMSG : promise->error->code());
+    const auto text = readSmallFile(file, {}, PromiseRecord::maximumFileSize);
+    if (text)
+        return readJson(*text, attributes);
+    const bool isDamaged = text.error->domain() == platform::errorDomain::cloud;
+    return SystemError(isDamaged ? EBADMSG : text.error->code());
 }
 
 SystemError writePromise(const FileDescriptor& file, const PromiseRecord& promise)
@@ -122,7 +140,9 @@ SystemError writeIdentifier(const FileDescriptor& file, std::uint32_t identifier
 {
     const auto path = descriptorPath(file);
     const auto form = AttributeReader(file).value(itemMark::promise);
-    auto promise = form ? PromiseRecord::parseShortForm(*form) : std::nullopt;
+    if (!form)
+        return form.error;
+    auto promise = *form ? PromiseRecord::parseShortForm(**form) : std::nullopt;
     const char* name = promise ? itemMark::promise : itemMark::documentIdentifier;
     if (promise)
         promise->documentIdentifier = identifier;

@@ -9,6 +9,8 @@
 #include "platform/Log.h"
 #include "platform/Weakly.h"
 
+#include <utility>
+
 namespace host::drive {
 
 namespace {
@@ -16,6 +18,8 @@ namespace {
 /// A person deletes and downloads several items in a row, and one walk serves them all.
 constexpr auto settled = std::chrono::seconds(5);
 constexpr auto laterOn = std::chrono::minutes(1);
+/// Work that takes less is over before anyone has read about it.
+constexpr auto worthSaying = std::chrono::milliseconds(500);
 
 } // namespace
 
@@ -43,10 +47,27 @@ void DriveUpkeep::putAllRight()
 {
     static constexpr platform::Operation op{"-[DriveUpkeep putAllRight]"};
     Recovery recovery(_layout, *_store);
-    recovery.run();
+    settleRecords(recovery);
     if (const auto failure = recovery.settleStraysAmongItems())
         op.warning("Cannot search the drive for private names: %@", failure);
     collect();
+}
+
+void DriveUpkeep::settleRecords(Recovery& recovery)
+{
+    const auto tell = platform::weakly(shared_from_this(), &DriveUpkeep::tell);
+    _isSettling = true;
+    _dispatch->after(worthSaying, _dispatch->mainQueue(), tell);
+    recovery.run();
+    _isSettling = false;
+    _dispatch->mainQueue()->async(tell);
+}
+
+void DriveUpkeep::tell()
+{
+    const bool isSettling = _isSettling;
+    if (std::exchange(_isTold, isSettling) != isSettling && _changed)
+        _changed();
 }
 
 void DriveUpkeep::contentReleased()

@@ -3,6 +3,7 @@
 
 #include "host/drive/service/LocalCloudDocumentService.h"
 
+#include "platform/NotificationCenter.h"
 #include "platform/TypeRegistry.h"
 #include "platform/Url.h"
 #include "platform/Weakly.h"
@@ -50,6 +51,9 @@ LocalCloudDocumentService::LocalCloudDocumentService(
     , _monitor(AccountMonitor::start(layout, dependencies))
 {
     _store->onRelease(platform::weakly(_upkeep, &DriveUpkeep::contentReleased));
+    _upkeep->onPuttingRight([center = dependencies.notificationCenter] {
+        center->post(platform::Notification::PuttingRightDidChange);
+    });
     if (settings.putRight == Settings::PutRight::Beside)
         _upkeep->putRightBeside();
     else

@@ -53,6 +53,7 @@ public:
     platform::CloudItems& items() override { return _items; }
     platform::DocumentIdentifiers& documentIdentifiers() override { return *_identifiers; }
     platform::SecurityScopedAccess& securityScopedAccess() override { return *this; }
+    bool isPuttingRight() const override { return _upkeep->isPuttingRight(); }
 
     // The user may access everything of the local store at any time, so no permission has to be requested.
     bool startAccessing(const platform::Url&) override { return false; }

@@ -33,7 +33,8 @@ PresentedItem::Finding PresentedItem::look()
     if (!found) {
         if (!_file || (errno != ENOENT && errno != ENOTDIR))
             return Finding::Same;
-        return whereabouts() ? Finding::Moved : Finding::Gone;
+        const auto place = whereabouts();
+        return place ? Finding::Moved : place.error.is(ENOENT) ? Finding::Gone : Finding::Same;
     }
     if (::fstat(found.get(), &status) != 0)
         return Finding::Same;
@@ -45,22 +46,26 @@ PresentedItem::Finding PresentedItem::look()
     return isSame ? Finding::Same : Finding::Changed;
 }
 
-std::optional<std::string> PresentedItem::whereabouts() const
+SystemResult<std::string> PresentedItem::whereabouts() const
 {
     std::array<char, PATH_MAX> buffer;
     const auto link = "/proc/self/fd/" + std::to_string(_file.get());
     const auto length = ::readlink(link.c_str(), buffer.data(), buffer.size());
-    if (length <= 0)
-        return std::nullopt;
+    if (length < 0)
+        return SystemError::last(_path);
     const std::string path(buffer.data(), static_cast<std::size_t>(length));
-    auto promised = promisedName(path);
-    const auto name = promised ? std::move(*promised) : std::string(lastName(path));
     // The kernel names a removed file too, with a remark at the end that could be part of a name, so the file
     // is checked.
     struct stat status;
-    if (isPassingName(name) || isLongPromiseName(name) || ::lstat(path.c_str(), &status) != 0
-        || status.st_dev != _version.device || status.st_ino != _version.inode)
-        return std::nullopt;
+    if (::lstat(path.c_str(), &status) != 0)
+        return errno == ENOTDIR ? SystemError(ENOENT, path) : SystemError::last(path);
+    auto promised = promisedName(path);
+    if (!promised && !promised.error.is(EBADMSG))
+        return promised.error;
+    const auto name = promised ? std::move(*promised) : std::string(lastName(path));
+    if (isPassingName(name) || isLongPromiseName(name) || status.st_dev != _version.device
+        || status.st_ino != _version.inode)
+        return SystemError(ENOENT, path);
     return siblingPath(path, name);
 }
 

@@ -4,9 +4,9 @@
 #pragma once
 
 #include "host/system/files/FileDescriptor.h"
+#include "host/system/files/SystemError.h"
 #include "platform/FileChanges.h"
 
-#include <optional>
 #include <string>
 
 namespace host::system {
@@ -33,9 +33,9 @@ public:
 
     /// Looks at the item's place. The item that is there is known from then on.
     Finding look();
-    /// Answers the current path of the known item, for a promise the path of its item, or nothing when it was
-    /// removed or is being removed.
-    std::optional<std::string> whereabouts() const;
+    /// Answers the current path of the known item, for a promise the path of its item. The error is ENOENT
+    /// when it was removed or is being removed; any other says nothing about that.
+    SystemResult<std::string> whereabouts() const;
     /// Says that the item belongs to another place from now on.
     void setPath(std::string path) { _path = std::move(path); }
     /// Says that the item was removed, so nothing is known any more.

@@ -191,7 +191,10 @@ void WatchedPresenter::tellMissing(FolderWatches& watches, std::vector<Notice>& 
         return;
     }
     _wasMissing = false;
-    if (const auto place = _item.whereabouts()) {
+    const auto place = _item.whereabouts();
+    if (!place && !place.error.is(ENOENT))
+        return; // the next look tells more
+    if (place) {
         _item.setPath(pathOnDrive(*place, _root));
         _item.look();
         notices.emplace_back([presenter = _presenter, url = Url::fileURL(_item.path())](auto& told) {

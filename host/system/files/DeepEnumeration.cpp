@@ -53,7 +53,7 @@ DeepEnumeration::Continue DeepEnumeration::readEntries(Level& level)
 {
     DirectoryReader reader(level.descriptor);
     while (const auto entry = reader.next()) {
-        const auto type = entry->type ? entry->type : typeOfEntry(level.descriptor, entry->name);
+        const auto type = reader.typeOf(*entry);
         if (!type)
             continue; // it was removed since the folder was read
         if (*type == FileType::Directory)

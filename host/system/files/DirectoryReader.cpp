@@ -18,7 +18,7 @@ namespace {
 
 constexpr int openFlags = O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC;
 
-std::optional<FileType> typeOf(const dirent64& entry)
+std::optional<FileType> typeSaidBy(const dirent64& entry)
 {
     if (entry.d_type == DT_UNKNOWN)
         return std::nullopt;
@@ -29,7 +29,7 @@ std::optional<FileType> typeOf(const dirent64& entry)
 
 bool DirectoryReader::fill()
 {
-    const auto read = getdents64(_descriptor, _buffer.data(), _buffer.size());
+    const auto read = getdents64(_folder.get(), _buffer.data(), _buffer.size());
     _error = SystemError::unless(read >= 0);
     _position = 0;
     _end = read > 0 ? static_cast<std::size_t>(read) : 0;
@@ -43,7 +43,7 @@ std::optional<DirectoryReader::Entry> DirectoryReader::next()
         _position += entry.d_reclen;
         const std::string_view name(entry.d_name);
         if (name != "." && name != "..")
-            return Entry{name, typeOf(entry)};
+            return Entry{name, typeSaidBy(entry)};
     }
     return std::nullopt;
 }
@@ -57,14 +57,22 @@ FileType fileType(unsigned mode)
     return S_ISLNK(mode) ? FileType::SymbolicLink : FileType::Other;
 }
 
-std::optional<FileType> typeOfEntry(const FileDescriptor& folder, std::string_view name)
+std::optional<FileType> DirectoryReader::typeOf(const Entry& entry) const
+{
+    if (entry.type)
+        return entry.type;
+    const auto type = typeOfEntry(_folder, entry.name);
+    return type.error.is(ENOENT) ? std::nullopt : std::optional(type.value.value_or(FileType::Other));
+}
+
+SystemResult<FileType> typeOfEntry(const FileDescriptor& folder, std::string_view name)
 {
     struct statx attributes;
     const std::string terminated(name);
     if (statx(
             folder.get(), terminated.c_str(), AT_SYMLINK_NOFOLLOW | AT_NO_AUTOMOUNT, STATX_TYPE, &attributes)
         != 0)
-        return std::nullopt;
+        return SystemError::last(name);
     return fileType(attributes.stx_mode);
 }
 

@@ -22,9 +22,9 @@ public:
         std::optional<platform::FileType> type; ///< absent when the file system does not say it
     };
 
-    /// `folder` stays open and belongs to the caller.
+    /// `folder` stays open and where it is, and belongs to the caller.
     explicit DirectoryReader(const FileDescriptor& folder)
-        : _descriptor(folder.get())
+        : _folder(folder)
     {
     }
     DirectoryReader(const DirectoryReader&) = delete;
@@ -34,18 +34,22 @@ public:
     std::optional<Entry> next();
     /// Answers the error that ended the reading early, if any.
     const SystemError& error() const { return _error; }
+    /// Answers the type of an entry that next() answered, or nothing when the entry is gone by now. An entry
+    /// whose type cannot be found out is there, so it is FileType::Other.
+    std::optional<platform::FileType> typeOf(const Entry& entry) const;
 
 private:
     bool fill();
 
-    int _descriptor;
+    const FileDescriptor& _folder;
     SystemError _error;
     std::size_t _position = 0, _end = 0;
     alignas(8) std::array<char, 64 * 1024> _buffer;
 };
 
-/// Answers the type of a name in an open folder, without following links.
-std::optional<platform::FileType> typeOfEntry(const FileDescriptor& folder, std::string_view name);
+/// Answers the type of a name in an open folder, without following links. The error is ENOENT when the name
+/// is gone; any other says nothing about that.
+SystemResult<platform::FileType> typeOfEntry(const FileDescriptor& folder, std::string_view name);
 /// Answers the type in the mode bits of a stat call.
 platform::FileType fileType(unsigned mode);
 /// Opens a folder to read its entries, without following a link.

@@ -103,7 +103,7 @@ void PosixFileSystem::enumerateShallowly(const platform::Url& folder,
     }
     DirectoryReader reader(*descriptor);
     while (const auto found = reader.next()) {
-        const auto type = found->type ? found->type : typeOfEntry(*descriptor, found->name);
+        const auto type = reader.typeOf(*found);
         const auto kind =
             type == FileType::Directory ? platform::PathKind::Directory : platform::PathKind::Unknown;
         if (type && entry(folder.appendingPathComponent(found->name, kind), *type) == Continue::No)

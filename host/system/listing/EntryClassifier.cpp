@@ -35,6 +35,11 @@ FolderEntryKind kindOfFile(std::string_view name)
 
 } // namespace
 
+bool LongNameReading::mayBeThere() const
+{
+    return failure && !failure.is(ENOENT) && !failure.is(EBADMSG);
+}
+
 FolderEntryKind EntryClassifier::kindOfFolder(std::string_view name) const
 {
     return _types->isPackageExtension(extensionOf(name)) ? FolderEntryKind::Package : FolderEntryKind::Folder;
@@ -49,15 +54,16 @@ std::optional<FolderEntry> EntryClassifier::promised(std::string_view name) cons
 }
 
 std::optional<FolderEntry> EntryClassifier::classify(
-    const FileDescriptor& folder, std::string_view name, FileType type, std::string& longName) const
+    const FileDescriptor& folder, std::string_view name, FileType type, LongNameReading& longName) const
 {
     if (!isLongPromiseName(name))
         return classify(name, type);
     auto read = type == FileType::Regular ? promisedName(folder, name) : SystemError(EBADMSG);
+    longName.failure = std::move(read.error);
     if (!read)
         return std::nullopt;
-    longName = std::move(*read);
-    return promised(longName);
+    longName.name = std::move(*read);
+    return promised(longName.name);
 }
 
 std::optional<FolderEntry> EntryClassifier::classify(std::string_view name, FileType type) const

@@ -5,6 +5,7 @@
 
 #include "host/system/desktop/MimeTypeRegistry.h"
 #include "host/system/files/FileDescriptor.h"
+#include "host/system/files/SystemError.h"
 #include "platform/FileSystem.h"
 #include "platform/FolderSnapshot.h"
 
@@ -14,6 +15,15 @@
 #include <string_view>
 
 namespace host::system {
+
+/// The name that the promise of a long name stands for, or why that could not be read.
+struct LongNameReading {
+    std::string name;
+    SystemError failure;
+
+    /// Answers whether the promise may well be there, with a name that it did not say now.
+    bool mayBeThere() const;
+};
 
 /// Decides from a name and the file system's type alone what a folder's list shows for it. Any thread.
 class EntryClassifier {
@@ -29,10 +39,11 @@ public:
     /// Does so for an entry of an open folder, also for the promise of a long name, which is read into
     /// `longName`. The entry's name is a part of that then.
     std::optional<platform::FolderEntry> classify(const FileDescriptor& folder, std::string_view name,
-        platform::FileType type, std::string& longName) const;
+        platform::FileType type, LongNameReading& longName) const;
+    /// Does so for the promise of the item with this name.
+    std::optional<platform::FolderEntry> promised(std::string_view name) const;
 
 private:
-    std::optional<platform::FolderEntry> promised(std::string_view name) const;
     platform::FolderEntryKind kindOfFolder(std::string_view name) const;
 
     std::shared_ptr<const MimeTypeRegistry> _types;

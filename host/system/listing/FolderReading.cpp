@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <cerrno>
+#include <utility>
 
 namespace host::system {
 
@@ -128,16 +129,18 @@ void FolderReading::readBlock()
 std::shared_ptr<ListingBlock> FolderReading::fillBlock()
 {
     auto block = std::make_shared<ListingBlock>();
-    std::string longName;
+    LongNameReading longName;
     while (block->count() < blockEntries) {
         const auto found = _reader->next();
         if (!found)
             break;
-        const auto type = found->type ? found->type : typeOfEntry(_descriptor, found->name);
+        const auto type = _reader->typeOf(*found);
         if (!type)
             continue; // it was removed since the folder was read
         if (const auto entry = _tools->classifier.classify(_descriptor, found->name, *type, longName))
             block->append(*entry);
+        else if (longName.mayBeThere())
+            _error = systemError(std::exchange(longName.failure, {}), _subject.folder.path());
     }
     return block;
 }

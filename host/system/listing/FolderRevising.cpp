@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cerrno>
 #include <numeric>
 #include <unordered_map>
 #include <unordered_set>
@@ -77,7 +78,7 @@ private:
 void Revising::lookAt(const FileDescriptor& folder, std::span<const std::string> names)
 {
     std::unordered_set<std::string> longPromises;
-    std::string longName;
+    LongNameReading longName;
     for (const auto& name : names) {
         if (isLongPromiseName(name))
             longPromises.insert(name);
@@ -106,12 +107,15 @@ Look Revising::look(const FileDescriptor& folder, const std::string& name) const
     Look found;
     const auto type = typeOfEntry(folder, name);
     const auto promise = promisePath(name);
-    std::string longName;
+    LongNameReading longName;
     std::optional<FolderEntry> entry;
-    if (type)
-        entry = _tools.classifier.classify(name, *type);
-    else if (const auto promiseType = typeOfEntry(folder, promise))
-        entry = _tools.classifier.classify(folder, promise, *promiseType, longName);
+    if (!type.error.is(ENOENT)) // what cannot be looked at is there
+        entry = _tools.classifier.classify(name, type.value.value_or(FileType::Other));
+    else if (const auto promiseType = typeOfEntry(folder, promise); !promiseType.error.is(ENOENT))
+        entry = _tools.classifier.classify(
+            folder, promise, promiseType.value.value_or(FileType::Regular), longName);
+    if (longName.mayBeThere())
+        entry = _tools.classifier.promised(name);
     if (entry)
         found = {true, entry->isPromise, false, entry->kind};
     return found;

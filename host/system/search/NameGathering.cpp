@@ -118,10 +118,10 @@ void NameGathering::copy(const NameIndex::Folder& folder, std::vector<std::strin
 void NameGathering::read(const FileDescriptor& descriptor, std::vector<std::string>& subfolders)
 {
     std::vector<std::pair<std::string, FolderEntryKind>> promised;
-    std::string longName;
+    LongNameReading longName;
     DirectoryReader reader(descriptor);
     while (const auto found = reader.next()) {
-        const auto type = found->type ? found->type : typeOfEntry(descriptor, found->name);
+        const auto type = reader.typeOf(*found);
         const auto entry =
             type ? _classifier.classify(descriptor, found->name, *type, longName) : std::nullopt;
         if (entry && entry->isPromise)

@@ -12,6 +12,7 @@
 #include "host/system/files/DriveNames.h"
 
 #include <sys/syscall.h>
+#include <sys/xattr.h>
 
 #include <algorithm>
 #include <cerrno>
@@ -67,12 +68,13 @@ std::vector<Operation> operations()
         {"drop", {"drop", trashedFolder}}, {"save", {"save", "inner/file.txt", "folder/a.txt"}},
         {"evict", {"evict", "inner/file.txt"}}, {"fetch", {"fetch", "inner/p.txt"}},
         {"evictPackage", {"evict", package}}, {"fetchPackage", {"fetch", packagePromise}},
+        {"tagFile", {"tag", "inner/file.txt", "Red", "Blue"}},
         {"tagPromise", {"tag", "inner/p.txt", "Red", "Blue"}}, {"evictLong", {"evict", longDocument}},
         {"fetchLong", {"fetch", longPromise}}, {"renameLong", {"move", longPromise, longDocument + "x"}},
         {"shortenLong", {"move", longPromise, "inner/new.txt"}},
         {"lengthenPromise", {"move", "inner/p.txt", longDocument + "x"}},
         {"docid", {"docid", "inner/file.txt"}}, {"docidPromise", {"docid", "inner/p.txt"}},
-        {"add", {"add", "target/new.txt", "inner/file.txt"}}, {"removeLibrary", {"remove-library", library}}};
+        {"add", {"add", "target/new.txt", "folder/a.txt"}}, {"removeLibrary", {"remove-library", library}}};
 }
 
 void SweepFixture::makeDrive() const
@@ -82,6 +84,7 @@ void SweepFixture::makeDrive() const
         fs::create_directories(at(folder));
     fs::create_directories(_layout.cloud());
     write(at("inner/file.txt"), std::string(100'000, 'f'));
+    ::setxattr(at("inner/file.txt").c_str(), host::drive::itemMark::tags, "Green", 5, 0);
     write(at("folder/a.txt"), "a");
     write(at("folder/sub/b.txt"), "bb");
     fs::create_symlink("../a.txt", at("folder/sub/link"));
@@ -186,6 +189,15 @@ Drive SweepFixture::seen() const
     return drive;
 }
 
+void SweepFixture::addMarks(
+    Drive& drive, const std::string& shown, const std::vector<std::string>& tags, std::uint32_t identifier)
+{
+    for (const auto& tag : tags)
+        drive["tag " + tag + " of " + shown] = marked;
+    if (identifier != 0)
+        drive["identifier of " + shown] = marked;
+}
+
 void SweepFixture::addItems(Drive& drive, const std::string& folder, const std::string& prefix) const
 {
     for (auto each = fs::recursive_directory_iterator(folder); each != fs::recursive_directory_iterator();
@@ -196,18 +208,15 @@ void SweepFixture::addItems(Drive& drive, const std::string& folder, const std::
             const auto promised = prefix.empty() ? *item : prefix + item->substr(folder.size() + 1);
             addPromised(drive, "promise of " + promised, path);
             const auto record = host::drive::readPromise(path).value.value_or(PromiseRecord());
-            for (const auto& tag : record.tags)
-                drive["tag " + tag + " of " + promised] = marked;
-            if (record.documentIdentifier != 0)
-                drive["identifier of " + promised] = marked;
+            addMarks(drive, promised, record.tags, record.documentIdentifier);
         } else if (each->path().filename().string().starts_with(".trw")) {
             each.disable_recursion_pending();
         } else {
             drive[shown] = each->is_symlink() ? "link to " + fs::read_symlink(path).string()
                 : each->is_directory()        ? "folder"
                                               : read(path);
-            if (host::drive::documentIdentifierAt(path) != 0)
-                drive["identifier of " + shown] = marked;
+            const auto marks = host::drive::ItemMarks::glimpse(host::drive::AttributeReader(path));
+            addMarks(drive, shown, marks.tags, marks.documentIdentifier);
         }
     }
 }

@@ -9,6 +9,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdint>
 #include <iosfwd>
 #include <map>
 #include <string>
@@ -87,6 +88,8 @@ protected:
 private:
     /// Answers the indexes of the calls that have their turn.
     std::vector<int> points(const IsPossible& isPossible, Turns turns) const;
+    static void addMarks(Drive& drive, const std::string& shown, const std::vector<std::string>& tags,
+        std::uint32_t identifier);
     void addItems(Drive& drive, const std::string& folder, const std::string& prefix) const;
     /// Answers the places in the trash with an item and a record.
     std::vector<std::string> trashPlaces() const;

@@ -447,7 +447,7 @@ TEST_F(PackageTest, EvictedAndFetchedIsTheSame)
     EXPECT_EQ(after.created(), before.created());
     EXPECT_EQ(after.marks.documentIdentifier, 77U);
     EXPECT_TRUE(after.marks.tags.empty());
-    EXPECT_EQ(AttributeReader(item.path()).value("user.foreign"), "kept");
+    EXPECT_EQ(*AttributeReader(item.path()).value("user.foreign"), "kept");
     EXPECT_FALSE(hasTraces());
     // The part is still in the cloud, and everything else is not.
     ASSERT_EQ(collect(), ContentCollection::Outcome::Done);

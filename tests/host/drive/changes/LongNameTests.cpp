@@ -90,7 +90,7 @@ TEST_P(LongNames, AreKeptWhileTheContentIsInTheCloud)
     EXPECT_EQ(contentOf(item), "text");
     EXPECT_FALSE(fs::exists(promiseOf(item)));
     EXPECT_FALSE(saysItsName(item.path())) << "only a promise needs it";
-    EXPECT_EQ(AttributeReader(item.path()).value("user.note"), "kept");
+    EXPECT_EQ(*AttributeReader(item.path()).value("user.note"), "kept");
     EXPECT_EQ(documentIdentifierAt(item.path()), *number);
     EXPECT_THAT(tagsAt(item.path(), false), ElementsAre("Red"));
     EXPECT_FALSE(hasTraces());

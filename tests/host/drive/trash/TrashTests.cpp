@@ -390,7 +390,7 @@ TEST_F(TrashTest, AContentThatNothingStandsForIsListedAndComesBack)
     cloud->items().download(Url::fileURL(*place), nullptr);
     settle();
     EXPECT_EQ(contentOf(*place), "text");
-    EXPECT_EQ(AttributeReader(*place).value("user.note"), "kept");
+    EXPECT_EQ(*AttributeReader(*place).value("user.note"), "kept");
     EXPECT_TRUE(fs::exists(layout().cloud() + "/of a promise"));
     EXPECT_FALSE(hasTraces());
 }
