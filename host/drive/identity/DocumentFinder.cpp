@@ -3,11 +3,15 @@
 
 #include "host/drive/identity/DocumentFinder.h"
 
+#include "host/drive/changes/Promises.h"
+#include "host/drive/changes/TreeWalk.h"
 #include "host/drive/changes/WorkRecord.h"
 #include "host/drive/identity/IdentifiedItem.h"
 #include "host/drive/records/ItemFacts.h"
+#include "host/drive/records/ItemMarks.h"
 #include "host/drive/records/PromiseFile.h"
 #include "host/system/files/DeepEnumeration.h"
+#include "host/system/files/DriveNames.h"
 #include "host/system/files/FileVersion.h"
 #include "host/system/files/ItemPaths.h"
 
@@ -16,11 +20,16 @@
 
 #include <algorithm>
 #include <array>
+#include <cerrno>
 #include <map>
 
 namespace host::drive {
 
 using host::system::DeepEnumeration;
+using host::system::FileDescriptor;
+using host::system::lastName;
+using host::system::SystemError;
+using host::system::SystemResult;
 using platform::FileType;
 using platform::Url;
 using Continue = platform::FileSystem::Continue;
@@ -89,7 +98,59 @@ Continue goOn(const Url&, const platform::Error&)
     return Continue::Yes; // a folder that cannot be read does not hide the others
 }
 
+/// Ends the walk (EEXIST) at an item that carries the identifier.
+class CarrierSearch : public TreeVisitor {
+public:
+    explicit CarrierSearch(std::uint32_t identifier)
+        : _identifier(identifier)
+    {
+    }
+    SystemError visitItem(
+        const FileDescriptor& folder, const std::string& name, const struct stat& found) override
+    {
+        if (!S_ISREG(found.st_mode))
+            return {};
+        // A promise has another name while it is in work. What is no promise answers EBADMSG.
+        const bool mayPromise = PromiseRecord::isPromiseName(name) || name.starts_with(system::passingPrefix);
+        const auto promise = mayPromise ? OpenPromise::open(folder, name) : SystemError(EBADMSG, name);
+        if (promise)
+            return judge(promise->record.documentIdentifier);
+        if (!promise.error.is(EBADMSG))
+            return promise.error;
+        const FileDescriptor file(::openat(folder.get(), name.c_str(), O_PATH | O_NOFOLLOW | O_CLOEXEC));
+        return file ? judge(documentIdentifierOf(file)) : SystemError::last(name);
+    }
+    SystemError enterFolder(
+        const FileDescriptor& folder, const struct stat&, const std::vector<std::string>&) override
+    {
+        return judge(documentIdentifierOf(folder));
+    }
+
+private:
+    SystemError judge(const SystemResult<std::uint32_t>& carried) const
+    {
+        return carried ? SystemError(*carried == _identifier ? EEXIST : 0) : carried.error;
+    }
+    const std::uint32_t _identifier;
+};
+
 } // namespace
+
+std::optional<bool> DocumentFinder::isCarried(std::uint32_t identifier) const
+{
+    const FileDescriptor home(::open(_layout.home().c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
+    if (!home)
+        return std::nullopt;
+    CarrierSearch search(identifier);
+    for (const auto& path : {_layout.documents(), _layout.trash(), _layout.held(), _layout.cloud()}) {
+        const auto failure = walkTree(home, std::string(lastName(path)), search, Mounts::Enter);
+        if (failure.is(EEXIST))
+            return true;
+        if (failure && !(failure.is(ENOENT) && existsOnDisk(path) == false))
+            return std::nullopt;
+    }
+    return false;
+}
 
 DocumentFinder::Finding DocumentFinder::find(
     const std::string& folder, Depth depth, const IdentifiedPlace& known, Effort effort) const

@@ -32,6 +32,10 @@ public:
     Finding findInFolderOf(const IdentifiedPlace& known, Effort effort) const;
     Finding findInDrive(const IdentifiedPlace& known, Effort effort) const;
 
+    /// Answers whether any item of the drive, in its trash, in the cloud or in work carries an identifier, or
+    /// nothing when that cannot be told, because something could not be read or was moved meanwhile.
+    std::optional<bool> isCarried(std::uint32_t identifier) const;
+
     /// Answers every item with an identifier.
     std::vector<IdentifiedPlace> findAll() const;
 

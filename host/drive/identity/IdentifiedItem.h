@@ -27,6 +27,8 @@ public:
     /// Answers whether this is a file or a folder, or the promise of one. Nothing else can carry an
     /// identifier.
     bool canCarryIdentifier() const;
+    /// Answers whether this is a file that is here.
+    bool isFile() const { return !_isPromise && S_ISREG(_status.st_mode); }
     /// Writes another identifier to the item or its promise, wherever that was moved meanwhile. ESTALE means
     /// that the file was replaced or removed.
     system::SystemError carry(std::uint32_t identifier) const;

@@ -4,6 +4,7 @@
 #include "host/drive/changes/DriveEntry.h"
 #include "host/drive/identity/IdentifiedItem.h"
 #include "host/drive/identity/LocalDocumentIdentifiers.h"
+#include "host/drive/records/LinkRecords.h"
 #include "host/drive/records/PromiseRecord.h"
 #include "host/drive/records/RealPath.h"
 #include "host/drive/records/SmallFile.h"
@@ -79,7 +80,30 @@ Result<std::uint32_t> LocalDocumentIdentifiers::identifyLocked(const std::string
         return itemError(_index.failure(), path);
     if (identifier != 0 && isOwner({identifier, answer.place}, answer.kind, item->place()))
         return identifier;
+    for (const auto& known :
+        identifier == 0 ? _index.documentsWithin(path) : std::vector<IdentifiedPlace>()) {
+        if (known.place.path == path && inheritLocked(known))
+            return known.identifier;
+    }
     return giveIdentifier(*item);
+}
+
+std::optional<DocumentPlace> LocalDocumentIdentifiers::inherit(const IdentifiedPlace& known)
+{
+    const auto lock = lockGiving(_layout);
+    return inheritLocked(known);
+}
+
+std::optional<DocumentPlace> LocalDocumentIdentifiers::inheritLocked(const IdentifiedPlace& known)
+{
+    if (known.place.inode == 0 || !isPlainRelativePath(known.place.path))
+        return std::nullopt;
+    const auto item = IdentifiedItem::open(_layout, known.place.path);
+    const bool isNewFile = item && item->isFile() && item->inode() != known.place.inode && item->carries(0);
+    if (!isNewFile || _finder.isCarried(known.identifier).value_or(true) || item->carry(known.identifier))
+        return std::nullopt;
+    _index.note(known.identifier, item->place());
+    return item->place();
 }
 
 bool LocalDocumentIdentifiers::isOwner(

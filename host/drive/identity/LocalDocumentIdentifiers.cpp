@@ -83,7 +83,9 @@ Result<platform::DocumentIdentifiers::File> LocalDocumentIdentifiers::resolve(
     const IdentifiedPlace known{identifier, std::move(answer.place)};
     if (answer.kind == Kind::Known && isAt(known))
         return File{known.place.inode, known.place.path};
-    const auto place = locate(known, effort);
+    auto place = locate(known, effort);
+    if (!place && answer.kind == Kind::Known && effort == Effort::Whole)
+        place = inherit(known);
     // An incomplete index is made anew, because every look-up would otherwise be a search.
     const bool isIncomplete = answer.kind != Kind::Known && _index.state() != DocumentIndex::State::Complete;
     if (isIncomplete || (!place && effort == Effort::Unnoticed))
@@ -175,6 +177,8 @@ void LocalDocumentIdentifiers::searchFor(const IdentifiedPlace& known)
         rebuild();
     else if (const auto place = locate(known, Effort::Whole))
         _index.note(known.identifier, *place);
+    else
+        inherit(known);
 }
 
 void LocalDocumentIdentifiers::rebuild()

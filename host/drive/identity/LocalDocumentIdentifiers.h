@@ -24,6 +24,10 @@ class IdentifiedItem;
 /// Identifiers are drawn at random, so that a lost index does not lead to one being given twice. The
 /// identifier of a removed document is kept as removed. Of two items with one identifier the one at the known
 /// inode keeps it, else the older one; the other gets a new identifier when it needs one.
+///
+/// A program that saves by putting a new file in a document's place leaves the identifier behind. The new
+/// file inherits it when either is asked for, but only when no item of the drive, of its trash or in work
+/// carries it, and all of them could be read.
 class LocalDocumentIdentifiers : public platform::DocumentIdentifiers,
                                  public std::enable_shared_from_this<LocalDocumentIdentifiers> {
 public:
@@ -65,6 +69,8 @@ private:
     void rebuild();
     void correct(std::uint32_t identifier, const std::string& path);
     platform::Result<std::uint32_t> identifyLocked(const std::string& path);
+    std::optional<DocumentPlace> inherit(const IdentifiedPlace& known);
+    std::optional<DocumentPlace> inheritLocked(const IdentifiedPlace& known);
     platform::Result<std::uint32_t> giveIdentifier(const IdentifiedItem& item);
     bool isOwner(const IdentifiedPlace& known, DocumentIndex::Answer::Kind kind, const DocumentPlace& place);
     bool isAt(const IdentifiedPlace& known) const;

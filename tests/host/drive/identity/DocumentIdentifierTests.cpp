@@ -130,8 +130,14 @@ TEST_F(DocumentIdentifierTests, aDocumentIsFoundWhereverItWentUnlessItIsGone)
         {"removed with its folder", [&] { remove("F"); }, nullptr},
         {"removed, a copy left", [&] { copyByOthers("F/a.txt", "b.txt"), remove("F/a.txt"); }, nullptr},
         {"removed by others", [&] { fs::remove(at("F/a.txt")); }, nullptr},
-        {"removed by others, another one in its place",
-            [&] { fs::remove(at("F/a.txt")), document("F/a.txt"); }, nullptr},
+        {"saved in the same way, the document itself in the trash",
+            [&] {
+                fs::create_directories(_drive.layout().trash());
+                fs::rename(at("F/a.txt"), _drive.layout().trash() + "/kept");
+                document("F/a.txt");
+            },
+            nullptr},
+        {"removed, a new file in its place", [&] { remove("F/a.txt"), document("F/a.txt"); }, nullptr},
         {"moved out of the drive, a link to it in its place",
             [&] {
                 fs::rename(at("F/a.txt"), _drive.folder().at("out.txt"));
@@ -156,6 +162,22 @@ TEST_F(DocumentIdentifierTests, aDocumentIsFoundWhereverItWentUnlessItIsGone)
         for (const char* rest : {"F", "Desktop/G", "b.txt", ".b.txt.trwpromise", "Desktop/b.txt"})
             fs::remove_all(at(rest));
     }
+}
+
+TEST_F(DocumentIdentifierTests, aNewFileInItsPlaceInheritsTheIdentifier)
+{
+    const auto identifier = identify(document("F/a.txt"));
+    const auto save = [&] { document("F/tmp"), moveByOthers("F/tmp", "F/a.txt"); };
+    save();
+    EXPECT_EQ(find(identifier), std::nullopt) << "the main thread does not look at everything";
+    _drive.settle();
+    EXPECT_EQ(find(identifier), _drive.url("F/a.txt"));
+    save();
+    EXPECT_EQ(identify(_drive.url("F/a.txt")), identifier);
+    evict("F/a.txt");
+    document("F/b.txt");
+    moveByOthers("F/b.txt", "F/a.txt");
+    EXPECT_NE(identify(_drive.url("F/a.txt")), identifier) << "the promise carries it";
 }
 
 TEST_F(DocumentIdentifierTests, aCopyGetsAnIdentifierOfItsOwn)
