@@ -8,6 +8,7 @@
 #include "browser/RunningChanges.h"
 #include "drawing/FileTags.h"
 #include "items/MenuEnableChecks.h"
+#include "items/UrlResolution.h"
 #include "kit/controllers/NavigationItem.h"
 #include "kit/views/Button.h"
 #include "kit/views/View.h"
@@ -27,6 +28,7 @@ using platform::ByteCountUnit;
 using platform::Operation;
 using platform::services;
 using platform::weakly;
+using platform::weaklyOr;
 using screens::DocumentListAction;
 using screens::DocumentListController;
 
@@ -44,6 +46,20 @@ constexpr auto offeredActions = actionBit(DocumentListAction::Delete) | actionBi
     | actionBit(DocumentListAction::Rename) | actionBit(DocumentListAction::Share)
     | actionBit(DocumentListAction::Move) | actionBit(DocumentListAction::PressurePop);
 
+/// Answers whether a folder may be made in a list's folder, and false as long as that would have to be looked
+/// up on the disk.
+bool canMakeFolderIn(const DocumentListController& list)
+{
+    return MenuEnableChecks::isPlaceKnown(list) && MenuEnableChecks::canEnableNewFolderForSelectedItems(list);
+}
+
+screens::DocumentListActionSet refusedActions(const platform::Url& item)
+{
+    constexpr auto changes = actionBit(DocumentListAction::Delete) | actionBit(DocumentListAction::Rename)
+        | actionBit(DocumentListAction::Move);
+    return trw_hasPathOfSpecialFolder(item) ? changes : screens::DocumentListActionSet();
+}
+
 } // namespace
 
 void NavController::initNewListController(const List& list)
@@ -57,6 +73,9 @@ void NavController::initNewListController(const List& list)
     const bool isRoot = viewControllers().empty() || viewControllers().front() == list;
     list->setTrashVerbs({weakly(this, &NavController::moveItemsToTrash),
         isRoot ? std::function<void()>(weakly(this, &NavController::showTrash)) : nullptr});
+    list->setFolderMaking({weaklyOr(false, list.get(), &canMakeFolderIn),
+        weakly(this, &NavController::promtForNewFolderAndCreate, nullptr)});
+    list->setRefusedActions(refusedActions);
     configureNavBar(list);
     if (list->title().empty())
         op.warning("Warning: newList title not set");
@@ -71,6 +90,8 @@ void NavController::initNewListController(const List& list)
 void NavController::placeBecameKnown(const std::weak_ptr<DocumentListController>& known)
 {
     const auto list = known.lock();
+    if (list)
+        list->folderMakingMayHaveChanged();
     if (_editMode && list == topViewController()) {
         enableNewFolder(*list);
         updateStatusUI(list);
@@ -80,8 +101,7 @@ void NavController::placeBecameKnown(const std::weak_ptr<DocumentListController>
 void NavController::enableNewFolder(const DocumentListController& list) const
 {
     if (_barButtonNewFolder)
-        _barButtonNewFolder->setEnabled(MenuEnableChecks::isPlaceKnown(list)
-            && MenuEnableChecks::canEnableNewFolderForSelectedItems(list));
+        _barButtonNewFolder->setEnabled(canMakeFolderIn(list));
 }
 
 void NavController::configureNavBar(const List& list)

@@ -19,12 +19,6 @@ platform::DocumentContainers& containers()
     return services().cloudDocumentService().containers();
 }
 
-bool hasPathOfSpecialFolder(const Url& url)
-{
-    const auto path = containers().pathRelativeToSyncedRoot(url);
-    return path == "BrindleDefault/Documents" || path == "BrindleDefault/Desktop";
-}
-
 } // namespace
 
 std::optional<Url> trw_URLByResolvingBookmark(const Url& url)
@@ -46,10 +40,16 @@ Url trw_URLByResolvingAlias(const Url& url)
     return target && !target.error ? trw_URLByResolvingPromise(*target) : url;
 }
 
+bool trw_hasPathOfSpecialFolder(const Url& url)
+{
+    const auto path = containers().pathRelativeToSyncedRoot(url);
+    return path == "BrindleDefault/Documents" || path == "BrindleDefault/Desktop";
+}
+
 bool trw_isDesktopOrDocumentsFolder(const Url& url)
 {
     // The path is compared first, because the container is looked up on the disk.
-    if (!hasPathOfSpecialFolder(url))
+    if (!trw_hasPathOfSpecialFolder(url))
         return false;
     const auto container = containers().containerForItem(url);
     return container && *container && trw_isDesktopOrDocumentsFolderIn(**container, url);
@@ -57,7 +57,8 @@ bool trw_isDesktopOrDocumentsFolder(const Url& url)
 
 bool trw_isDesktopOrDocumentsFolderIn(const DocumentContainer& container, const Url& url)
 {
-    return container.identifier == containers().defaultContainerIdentifier() && hasPathOfSpecialFolder(url);
+    return container.identifier == containers().defaultContainerIdentifier()
+        && trw_hasPathOfSpecialFolder(url);
 }
 
 bool trw_canCrossZoneMoveURLs(const std::vector<Url>& urls)

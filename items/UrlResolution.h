@@ -26,6 +26,9 @@ Url trw_URLByResolvingAlias(const Url& url);
 /// Answers whether this is the Desktop or the Documents folder at the top of the default container. Those two
 /// are never moved, renamed or deleted.
 bool trw_isDesktopOrDocumentsFolder(const Url& url);
+/// Answers whether the path is the one of such a folder, without a look at the disk. It is not one of them
+/// when it is in no container.
+bool trw_hasPathOfSpecialFolder(const Url& url);
 /// Answers the same for an item of a container that was looked up before, without a look at the disk.
 bool trw_isDesktopOrDocumentsFolderIn(const DocumentContainer& container, const Url& url);
 

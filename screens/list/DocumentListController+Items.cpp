@@ -202,14 +202,16 @@ kit::Menu DocumentListController::menuFor(const RowItem& item)
             .image = {}});
     if (item.isPromise)
         addDownloadEntries(menu, _downloadVerbs, {item});
+    const auto refused = _refusedActions ? _refusedActions(item.url) : DocumentListActionSet();
     for (const auto& entry : menuEntries) {
         if (entry.action == DocumentListAction::Delete && !item.isPromise)
             addDownloadEntries(menu, _downloadVerbs, {item});
         if (entry.action == DocumentListAction::Delete && item.kind != FolderEntryKind::Library) {
             addTagsEntry(menu, {item.url});
-            addTrashEntry(menu, {item.url});
+            if ((refused & actionBit(DocumentListAction::Delete)) == 0)
+                addTrashEntry(menu, {item.url});
         }
-        if (!offers(entry.action, item.kind))
+        if (!offers(entry.action, item.kind) || (refused & actionBit(entry.action)) != 0)
             continue;
         auto chosen = weakly(this, &DocumentListController::perform, entry.action, item.url);
         menu.push_back({.title = localized(entry.title),

@@ -43,6 +43,17 @@ void DocumentListController::setOrder(const ListOrder& order)
     refresh();
 }
 
+bool DocumentListController::canMakeFolder() const
+{
+    return _folderMaking.make && _folderMaking.isPossible();
+}
+
+void DocumentListController::folderMakingMayHaveChanged()
+{
+    if (_state && isViewLoaded())
+        showStateOfFolder();
+}
+
 void DocumentListController::addTagsEntry(kit::Menu& menu, std::vector<Url> items) const
 {
     if (_editTags && !items.empty())
@@ -78,11 +89,13 @@ kit::Menu DocumentListController::optionsMenu()
         addTagsEntry(menu, selectedItems());
         addTrashEntry(menu, selectedItems());
     }
+    if (!_editing && canMakeFolder())
+        menu.push_back({.title = localized("New Folder"), .handler = _folderMaking.make});
     const auto firstChoice = menu.size();
     for (const auto& entry : keyEntries)
         choice(entry.title, _order.key == entry.key ? _order : _order.sortedBy(entry.key),
             _order.key == entry.key);
-    menu[firstChoice].beginsSection = _editing;
+    menu[firstChoice].beginsSection = firstChoice > 0;
     const auto directionStart = menu.size();
     for (const auto direction : {OrderDirection::Ascending, OrderDirection::Descending}) {
         const bool ascends = direction == OrderDirection::Ascending;

@@ -258,6 +258,8 @@ void DocumentListController::showStateOfFolder()
         _placeholder->setContent({.iconName = "folder-open-symbolic",
             .title = localized("Folder is empty"),
             .message = localized("What you put into this folder appears here.")});
+        if (canMakeFolder())
+            _placeholder->setActions({{localized("New Folder"), _folderMaking.make}});
     }
 }
 

@@ -103,6 +103,20 @@ public:
     };
     void setTrashVerbs(TrashVerbs verbs) { _trashVerbs = std::move(verbs); }
 
+    /// How the list makes a folder in its folder, which its menu and an empty list offer while `isPossible`
+    /// answers true.
+    struct FolderMaking {
+        std::function<bool()> isPossible;
+        std::function<void()> make;
+    };
+    void setFolderMaking(FolderMaking making) { _folderMaking = std::move(making); }
+    /// Tells the list that `isPossible` may answer something else now.
+    void folderMakingMayHaveChanged();
+    /// Says which actions would be refused for an item, so that its menu leaves them out. The function looks
+    /// at no disk. The keys still lead to the refusal, which says why.
+    using RefusedActions = std::function<DocumentListActionSet(const Url& item)>;
+    void setRefusedActions(RefusedActions refused) { _refusedActions = std::move(refused); }
+
     /// What the menus offer to do with the contents of items; nothing at first.
     void setDownloadVerbs(DownloadVerbs verbs) { _downloadVerbs = std::move(verbs); }
 
@@ -166,6 +180,7 @@ private:
     std::shared_ptr<DocumentListController> self();
     void contentsDidChange(const FolderContentsUpdate& update);
     void showStateOfFolder();
+    bool canMakeFolder() const;
     void offerSearch();
     /// Takes the keyboard focus once for each appearance, as soon as there are rows.
     void takeKeyboard();
@@ -220,6 +235,8 @@ private:
     EditTags _editTags;
     DownloadVerbs _downloadVerbs;
     TrashVerbs _trashVerbs;
+    FolderMaking _folderMaking;
+    RefusedActions _refusedActions;
     ListOrder _order;
     bool _editing = false;
     std::optional<ListingStage> _state; ///< the stage of the latest update; absent before the first

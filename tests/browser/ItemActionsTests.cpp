@@ -5,15 +5,19 @@
 #include "kit/controllers/BarButtonItem.h"
 #include "kit/views/Button.h"
 #include "kit/views/Label.h"
+#include "kit/views/ListView.h"
 #include "kit/views/TextField.h"
 #include "kit/views/View.h"
 #include "preview/PreviewItemManager.h"
 #include "prompts/FilenamePrompt.h"
 #include "prompts/SimpleTextViewController.h"
+#include "screens/PlaceholderView.h"
 #include "screens/list/DocumentListAction.h"
 #include "screens/list/DocumentListController.h"
 #include "screens/move/MoveTargetPicker.h"
 #include "tests/browser/support/BrowserFixture.h"
+
+#include <set>
 
 namespace tarrow {
 namespace {
@@ -71,6 +75,46 @@ TEST_F(ItemActionsTest, ItemsFollowIntoTheFolderThatIsMadeForThem)
     EXPECT_EQ(enter("Some"), "2 items couldn’t be moved.");
     EXPECT_NE(alert(), nullptr) << "it stays over the new folder";
     EXPECT_TRUE(isThere("Some/c.txt")) << "a failure does not stop the others";
+}
+
+TEST_F(ItemActionsTest, AMenuLeavesOutWhatWouldBeRefused)
+{
+    write("a.txt");
+    launch();
+    const auto titles = [&](std::size_t row) {
+        std::set<std::string> all;
+        for (const auto& entry : topList()->listView()->menuForRow(row))
+            all.insert(entry.title);
+        return all;
+    };
+    const auto items = topList()->containedItems();
+    for (std::size_t row = 0; row < items.size(); ++row) {
+        const bool isSpecial = items[row].lastPathComponent() != "a.txt";
+        for (const char* title : {"Rename", "Move", "Delete", "Move to Trash"})
+            EXPECT_EQ(titles(row).contains(title), !isSpecial) << title << " of " << items[row].path();
+        EXPECT_TRUE(titles(row).contains("Info"));
+    }
+    EXPECT_EQ(items.size(), 3U);
+}
+
+TEST_F(ItemActionsTest, AFolderIsMadeFromTheMenuAndFromAnEmptyFolder)
+{
+    const auto folder = drive.makeFolder("Empty");
+    launch();
+    ASSERT_TRUE(warp("Empty"));
+    const auto list = topList();
+    ASSERT_EQ(list->placeholder()->buttons().size(), 1U);
+    list->placeholder()->buttons().front()->press();
+    EXPECT_EQ(enter("One"), "");
+    EXPECT_TRUE(isThere("Empty/One"));
+    list->refresh();
+    settle();
+    EXPECT_TRUE(list->placeholder()->isHidden());
+    const auto menu = list->listView()->menuForList();
+    ASSERT_EQ(menu.front().title, "New Folder");
+    menu.front().handler();
+    EXPECT_EQ(enter("Two"), "");
+    EXPECT_TRUE(isThere("Empty/Two"));
 }
 
 TEST_F(ItemActionsTest, SpecialFoldersStayAsTheyAre)
