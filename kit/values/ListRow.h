@@ -31,6 +31,9 @@ struct ListRow {
     std::string title;
     std::string detail; ///< second line; empty: none
     RowAccessory accessory = RowAccessory::None;
+    /// The accessible name of a button that opens the row's menu, as a right click does; empty: no button.
+    /// There is none beside a check mark.
+    std::string menuName;
     CheckState check = CheckState::None; ///< the list sets it by its selection
     std::vector<TagDot> tagDots; ///< beside the title, in this order
     DownloadState download = DownloadState::Present;

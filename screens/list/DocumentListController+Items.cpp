@@ -49,6 +49,13 @@ bool holds(const DocumentRows& rows, const Url& url)
 
 } // namespace
 
+void DocumentListController::setAvailableActions(DocumentListActionSet actions)
+{
+    _availableActions = actions;
+    if (_rows)
+        _rows->setOffersMenus(actions != 0);
+}
+
 std::size_t DocumentListController::containedItemCount() const
 {
     return _contents ? _contents->rows()->count() : 0;

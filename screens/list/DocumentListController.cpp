@@ -122,6 +122,7 @@ void DocumentListController::loadView()
 void DocumentListController::viewDidLoad()
 {
     _rows = DocumentRowSource::create(_listView);
+    _rows->setOffersMenus(_availableActions != 0);
     setDelegate(_delegate);
     _listView->setDataSource(_rows);
     _listView->setListDelegate(

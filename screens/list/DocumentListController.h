@@ -91,7 +91,7 @@ public:
 
     /// The actions that an item's menu offers. There are none at first.
     DocumentListActionSet availableActions() const { return _availableActions; }
-    void setAvailableActions(DocumentListActionSet actions) { _availableActions = actions; }
+    void setAvailableActions(DocumentListActionSet actions);
     /// The menus of an item and of the selected items offer to change their tags, and call this function with
     /// these items. Without a function they do not.
     using EditTags = std::function<void(const std::vector<Url>& items)>;

@@ -92,6 +92,8 @@ kit::ListRow DocumentRowSource::rowAtIndex(const kit::ListView&, std::size_t ind
     row.image = iconFor(index, entry);
     row.title = displayName(entry.name);
     row.accessory = opensAsFolder(entry.kind) ? kit::RowAccessory::Disclosure : kit::RowAccessory::None;
+    if (_offersMenus)
+        row.menuName = localized("Actions for “%@”", {row.title});
     row.download = entry.isPromise ? kit::DownloadState::InCloud : kit::DownloadState::Present;
     const auto known = _known.find(row.id);
     const bool isKnown = known != _known.end();

@@ -42,6 +42,9 @@ public:
     void setRows(std::shared_ptr<const DocumentRows> rows) { _rows = std::move(rows); }
     void setTagDots(TagDots tagDots) { _tagDots = std::move(tagDots); }
 
+    /// Gives the rows a button that opens their menus, or takes it away.
+    void setOffersMenus(bool offers) { _offersMenus = offers; }
+
     /// Dims these rows, in place of the ones before.
     void setDimmed(std::unordered_set<kit::RowId> rows);
 
@@ -102,6 +105,7 @@ private:
     std::shared_ptr<ThumbnailLoader> _thumbnails;
     Observation _onDownloads, _onTagTable;
     TagDots _tagDots;
+    bool _offersMenus = false;
     Places _places;
     std::unordered_map<kit::RowId, Known> _known;
     std::unordered_set<kit::RowId> _dimmed;

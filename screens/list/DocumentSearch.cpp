@@ -57,6 +57,7 @@ void DocumentSearch::build()
     _results->setAutoresizing({.flexibleWidth = true, .flexibleHeight = true});
     _source = DocumentRowSource::create(_results);
     _source->setPlaces(placeText);
+    _source->setOffersMenus(true);
     _source->setTagDots(_handlers.dots);
     _results->setDataSource(_source);
     _results->setListDelegate(std::shared_ptr<kit::ListViewDelegate>(

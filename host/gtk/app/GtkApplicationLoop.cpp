@@ -125,7 +125,7 @@ ShortcutItem recentDocumentShortcut()
 /// Answers the launcher's shortcut for which a request stands; nothing for every other request.
 std::optional<ShortcutItem> shortcutOf(const LaunchRequest& request)
 {
-    if (request == LaunchRequest(OpenSearch()))
+    if (const auto* search = std::get_if<OpenSearch>(&request); search && !search->query)
         return searchShortcut();
     return std::holds_alternative<OpenRecentDocument>(request) ? std::optional(recentDocumentShortcut())
                                                                : std::nullopt;

@@ -18,7 +18,7 @@ constexpr float markMargin = 8; ///< points beside a check mark in which a touch
 constexpr int dotHeight = 10;
 
 /// The parts of a row, from its leading edge to its trailing one.
-enum Part { Check, Icon, Texts, Dots, Download, Progress, Chevron, partCount };
+enum Part { Check, Icon, Texts, Dots, Download, Progress, Chevron, Menu, partCount };
 
 struct TrwListRow {
     GtkWidget parent;
@@ -51,7 +51,18 @@ void request(GtkWidget* widget, const char* action, GVariant*)
 {
     using host::gtk::ListRowWidget::Request;
     const bool isMenu = std::string_view(action) == "row.menu";
-    (*rowOf(widget)->handler)(widget, isMenu ? Request::Menu : Request::Peek);
+    (*rowOf(widget)->handler)(widget, isMenu ? Request::Menu : Request::Peek,
+        gtk_widget_get_width(widget) / 2.0, gtk_widget_get_height(widget) / 2.0);
+}
+
+void menuPressed(GtkButton* button, gpointer data)
+{
+    auto* widget = static_cast<GtkWidget*>(data);
+    double x = 0, y = 0;
+    gtk_widget_translate_coordinates(GTK_WIDGET(button), widget,
+        gtk_widget_get_width(GTK_WIDGET(button)) / 2.0, gtk_widget_get_height(GTK_WIDGET(button)) / 2.0, &x,
+        &y);
+    (*rowOf(widget)->handler)(widget, host::gtk::ListRowWidget::Request::Menu, x, y);
 }
 
 void removeParts(TrwListRow* row)
@@ -149,6 +160,18 @@ GtkWidget* checkMark()
     return check;
 }
 
+/// The row's own keys open the menu, so the button is for touches, clicks and assistive technology only.
+GtkWidget* menuButton(TrwListRow* row)
+{
+    auto* button = gtk_button_new_from_icon_name("view-more-symbolic");
+    gtk_button_set_has_frame(GTK_BUTTON(button), FALSE);
+    gtk_widget_add_css_class(button, "row-menu");
+    gtk_widget_set_focusable(button, FALSE);
+    gtk_widget_set_focus_on_click(button, FALSE);
+    g_signal_connect(button, "clicked", G_CALLBACK(menuPressed), row);
+    return button;
+}
+
 GtkWidget* makePart(TrwListRow* row, Part part)
 {
     switch (part) {
@@ -164,6 +187,8 @@ GtkWidget* makePart(TrwListRow* row, Part part)
         return gtk_image_new_from_icon_name("trw-in-cloud-symbolic");
     case Progress:
         return drawing(row, drawProgress, smallIconSize, smallIconSize);
+    case Menu:
+        return menuButton(row);
     default:
         return gtk_image_new_from_icon_name("go-next-symbolic");
     }
@@ -215,6 +240,9 @@ void showMarks(TrwListRow* row, const kit::ListRow& content)
     if (auto* progress = showPart(row, Progress, content.download == kit::DownloadState::Downloading))
         gtk_widget_queue_draw(progress);
     showPart(row, Chevron, content.accessory == kit::RowAccessory::Disclosure && !isEditing);
+    if (auto* menu = showPart(row, Menu, !content.menuName.empty() && !isEditing))
+        gtk_accessible_update_property(
+            GTK_ACCESSIBLE(menu), GTK_ACCESSIBLE_PROPERTY_LABEL, content.menuName.c_str(), -1);
     if (auto* dots = showPart(row, Dots, !content.tagDots.empty())) {
         gtk_drawing_area_set_content_width(GTK_DRAWING_AREA(dots),
             static_cast<int>(kit::TagDots::size(content.tagDots.size(), dotHeight).width));
@@ -239,6 +267,7 @@ void showStyle(TrwListRow* row, const kit::ListRow& content)
     };
     setClass("section", content.kind == kit::RowKind::SectionHeader);
     setClass("dimmed", content.isDimmed);
+    setClass("with-menu", row->parts[Menu] && gtk_widget_get_visible(row->parts[Menu]));
     gtk_list_item_set_activatable(row->item, content.kind == kit::RowKind::Item);
 }
 

@@ -17,7 +17,8 @@ namespace ListRowWidget {
 
 /// The actions that a row requests at its present place.
 enum class Request { Menu, Peek };
-using Handler = std::function<void(GtkWidget* row, Request request)>;
+/// The place is in the row's own coordinates.
+using Handler = std::function<void(GtkWidget* row, Request request, double x, double y)>;
 
 GtkWidget* make(GtkListItem* item, Handler handler);
 bool isRow(GtkWidget* widget);

@@ -181,9 +181,8 @@ void ListViewPeer::connectInput()
 void ListViewPeer::setUpRow(GtkListItem* item)
 {
     using Request = ListRowWidget::Request;
-    auto* row =
-        ListRowWidget::make(item, weakly(this, [](ListViewPeer& self, GtkWidget* asked, Request request) {
-            const double x = gtk_widget_get_width(asked) / 2.0, y = gtk_widget_get_height(asked) / 2.0;
+    auto* row = ListRowWidget::make(
+        item, weakly(this, [](ListViewPeer& self, GtkWidget* asked, Request request, double x, double y) {
             if (request == Request::Peek)
                 self.held(asked, x, y);
             else

@@ -196,12 +196,27 @@ public:
         kit::ListRow row;
         row.id = ids[index];
         row.title = titles.contains(row.id) ? titles.at(row.id) : "Row " + std::to_string(row.id);
+        row.menuName = offersMenus ? "Actions for " + row.title : "";
         return row;
     }
     kit::RowId rowIdAtIndex(const kit::ListView&, std::size_t index) const override { return ids[index]; }
 
     std::vector<kit::RowId> ids;
     std::map<kit::RowId, std::string> titles;
+    bool offersMenus = false;
+};
+
+/// Notes the rows whose menu was asked for and those that were activated.
+class RowLog : public kit::ListViewDelegate {
+public:
+    kit::Menu menuForRow(kit::ListView&, std::size_t index) override
+    {
+        menus.push_back(index);
+        return {};
+    }
+    void rowActivated(kit::ListView&, std::size_t index) override { activated.push_back(index); }
+
+    std::vector<std::size_t> menus, activated;
 };
 
 class ListTests : public testing_support::WindowFixture {
@@ -263,6 +278,31 @@ protected:
     std::shared_ptr<Numbers> rows = std::make_shared<Numbers>();
     std::shared_ptr<kit::ListView> list = std::make_shared<kit::ListView>();
 };
+
+TEST_F(ListTests, ARowsButtonOpensItsMenuAndNotTheRow)
+{
+    rows->offersMenus = true;
+    const auto log = std::make_shared<RowLog>();
+    list->setListDelegate(log);
+    showRows(3);
+    const auto menuButton = [&] {
+        const auto shown = listPeer().liveRows();
+        auto* row = *std::ranges::find(shown, 1U, host::gtk::ListRowWidget::position);
+        auto* last = gtk_widget_get_last_child(row);
+        return GTK_IS_BUTTON(last) && gtk_widget_get_visible(last) ? last : nullptr;
+    };
+    auto* button = menuButton();
+    ASSERT_NE(button, nullptr);
+    EXPECT_GE(gtk_widget_get_width(button), 44);
+    EXPECT_GE(gtk_widget_get_height(button), 44);
+    g_signal_emit_by_name(button, "clicked");
+    EXPECT_EQ(log->menus, std::vector<std::size_t>{1});
+    EXPECT_EQ(log->activated, std::vector<std::size_t>());
+    list->setSelectionMode(kit::SelectionMode::Multiple);
+    list->reloadAll();
+    settle();
+    EXPECT_EQ(menuButton(), nullptr) << "a check mark is there";
+}
 
 TEST_F(ListTests, RowWidgetsMatchTheModelThroughEveryChange)
 {
