@@ -370,6 +370,21 @@ void NavController::moveItemsToDirectoryAndShowErrorsToDirectory(
     changeBegun(change);
 }
 
+PreviewVerbs NavController::previewVerbs()
+{
+    return {
+        .share = weakly(this,
+            [](NavController& self, const Url& document) {
+                self.showDICUrlCompletion(nullptr, document, {});
+            }),
+        .rename = weakly(this, &NavController::showRenamePrompt),
+        .showInfo =
+            weakly(this, [](NavController& self, const Url& document) { self.performInfo(document, {}); }),
+        .moveToTrash =
+            weakly(this, [](NavController& self, const Url& document) { self.moveItemsToTrash({document}); }),
+    };
+}
+
 void NavController::showRenamePrompt(const Url& url)
 {
     askForName(url, {});

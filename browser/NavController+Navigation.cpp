@@ -172,6 +172,7 @@ void NavController::replaceItemManager(int mode)
     _itemManager = PreviewItemManager::newItemManagerWithModeNavController(mode, self());
     _itemManager->setUndoHistory(_undoHistory);
     _itemManager->setDownloadVerbs(downloadVerbs());
+    _itemManager->setPreviewVerbs(previewVerbs());
 }
 
 void NavController::showPreviewPreviewMode(const std::shared_ptr<DRItem>& item, int mode)

@@ -10,6 +10,7 @@
 #include "platform/Date.h"
 #include "platform/NotificationCenter.h"
 #include "platform/Weakly.h"
+#include "preview/PreviewVerbs.h"
 #include "prompts/DocumentListControllerStatusBar.h"
 #include "prompts/QuotaFetcher.h"
 #include "screens/DocumentInteractionSheet.h"
@@ -221,6 +222,7 @@ public:
     /// Shows the share sheet of an item at a view or, without a view, at the browser's own.
     void showDICUrlCompletion(
         const std::shared_ptr<kit::View>& view, const platform::Url& url, const Completion& completion);
+    PreviewVerbs previewVerbs();
     /// Asks for an item's new name.
     void showRenamePrompt(const platform::Url& url);
     /// Moves items into a folder one after the other, and answers the errors of those that could not be

@@ -4,7 +4,9 @@
 #include "preview/LookwellItemController.h"
 
 #include "items/DRItem.h"
+#include "kit/controllers/NavigationItem.h"
 #include "kit/views/View.h"
+#include "platform/Localization.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "platform/TypeRegistry.h"
@@ -12,6 +14,8 @@
 #include "preview/PreviewItemManager.h"
 #include "preview/TarrowDriveAppPreview.h"
 #include "screens/DocumentInteractionSheet.h"
+
+#include <utility>
 
 namespace tarrow {
 
@@ -38,6 +42,8 @@ std::shared_ptr<LookwellItemController> LookwellItemController::init()
     self.setDataSource(std::shared_ptr<PreviewControllerDataSource>(controller, &self));
     self.setDelegate(std::shared_ptr<PreviewControllerDelegate>(controller, &self));
     self.addButtons();
+    self.navigationItem().setMenu(platform::localized("More"),
+        platform::weaklyOr(kit::Menu(), controller, &LookwellItemController::menu));
     self.setOpenInHandler(weakly(controller, &LookwellItemController::showOtherApps));
     return controller;
 }
@@ -52,6 +58,34 @@ void LookwellItemController::addButtons()
     setAdditionalRightBarButtonItems(
         {button(SystemItem::Trash, &LookwellItemController::showWarningAndDeleteDocument),
             button(SystemItem::Organize, &LookwellItemController::showMoveTarget)});
+}
+
+kit::Menu LookwellItemController::menu()
+{
+    constexpr std::pair<const char*, PreviewVerbs::Verb PreviewVerbs::*> entries[] = {
+        {"Share", &PreviewVerbs::share},
+        {"Rename", &PreviewVerbs::rename},
+        {"Info", &PreviewVerbs::showInfo},
+        {"Move to Trash", &PreviewVerbs::moveToTrash},
+    };
+    kit::Menu menu;
+    const auto manager = itemManager();
+    for (const auto& [title, verb] : entries) {
+        if (manager && currentPreviewItem() && manager->previewVerbs().*verb)
+            menu.push_back({.title = platform::localized(title),
+                .handler = weakly(this, &LookwellItemController::perform, verb),
+                .image = {}});
+    }
+    return menu;
+}
+
+void LookwellItemController::perform(PreviewVerbs::Verb PreviewVerbs::*verb)
+{
+    keepEdits();
+    const auto manager = itemManager();
+    const auto item = manager ? manager->item() : nullptr;
+    if (item && manager->previewVerbs().*verb)
+        (manager->previewVerbs().*verb)(item->url());
 }
 
 void LookwellItemController::viewWillDisappear(bool animated)

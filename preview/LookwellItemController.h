@@ -6,6 +6,7 @@
 #include "kit/values/Menu.h"
 #include "platform/LatestLook.h"
 #include "platform/Url.h"
+#include "preview/PreviewVerbs.h"
 #include "screens/preview/PreviewController.h"
 
 #include <memory>
@@ -51,6 +52,8 @@ public:
 
 private:
     void addButtons();
+    kit::Menu menu();
+    void perform(PreviewVerbs::Verb PreviewVerbs::*verb);
     /// Offers other apps for a document that has no preview.
     void showOtherApps(const platform::Url& item, const std::shared_ptr<kit::View>& from);
     std::size_t numberOfPreviewItemsInPreviewController(

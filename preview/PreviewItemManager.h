@@ -13,6 +13,7 @@
 #include "platform/Url.h"
 #include "platform/Weakly.h"
 #include "preview/PreviewMode.h"
+#include "preview/PreviewVerbs.h"
 #include "screens/list/DocumentListController.h"
 #include "screens/move/MoveTargetPicker.h"
 
@@ -74,6 +75,9 @@ public:
     /// What the details' menu does with the item's content. Without a function the menu does not offer it.
     const screens::DownloadVerbs& downloadVerbs() const { return _downloadVerbs; }
     void setDownloadVerbs(screens::DownloadVerbs verbs) { _downloadVerbs = std::move(verbs); }
+    /// What the quick preview's menu does with the item; nothing at first.
+    const PreviewVerbs& previewVerbs() const { return _previewVerbs; }
+    void setPreviewVerbs(PreviewVerbs verbs) { _previewVerbs = std::move(verbs); }
     /// The history that gets the item's changes; null: none does.
     std::shared_ptr<UndoHistory> undoHistory() const { return _undoHistory.lock(); }
     void setUndoHistory(std::weak_ptr<UndoHistory> history) { _undoHistory = std::move(history); }
@@ -182,6 +186,7 @@ private:
     std::weak_ptr<UndoHistory> _undoHistory;
     const std::shared_ptr<platform::LatestLook> _look = std::make_shared<platform::LatestLook>();
     screens::DownloadVerbs _downloadVerbs;
+    PreviewVerbs _previewVerbs;
     std::optional<AccountSession> _moveAsked; ///< who was asked last for the destination of a move
     std::optional<platform::Url> _movedTo; ///< where the user of this program has moved the item last
 

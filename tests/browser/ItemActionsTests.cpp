@@ -3,6 +3,7 @@
 
 #include "kit/controllers/AlertController.h"
 #include "kit/controllers/BarButtonItem.h"
+#include "kit/controllers/NavigationItem.h"
 #include "kit/views/Button.h"
 #include "kit/views/Label.h"
 #include "kit/views/ListView.h"
@@ -115,6 +116,31 @@ TEST_F(ItemActionsTest, AFolderIsMadeFromTheMenuAndFromAnEmptyFolder)
     menu.front().handler();
     EXPECT_EQ(enter("Two"), "");
     EXPECT_TRUE(isThere("Empty/Two"));
+}
+
+TEST_F(ItemActionsTest, APreviewsMenuActsOnItsDocument)
+{
+    write("a.txt");
+    launch();
+    const auto choose = [&](const std::string& title) {
+        ASSERT_TRUE(warp("a.txt"));
+        for (const auto& entry : browser->topViewController()->navigationItem().menu()()) {
+            if (entry.title == title)
+                entry.handler();
+        }
+        settle();
+    };
+    choose("Share");
+    EXPECT_NE(browser->topViewController()->presentedViewController(), nullptr);
+    choose("Info");
+    EXPECT_THAT(stack(), ElementsAre("BrindleDefault", "i"));
+    choose("Rename");
+    EXPECT_EQ(enter("b.txt"), "");
+    EXPECT_TRUE(isThere("b.txt"));
+    write("a.txt");
+    choose("Move to Trash");
+    EXPECT_FALSE(isThere("a.txt"));
+    EXPECT_THAT(stack(), ElementsAre("BrindleDefault"));
 }
 
 TEST_F(ItemActionsTest, SpecialFoldersStayAsTheyAre)
