@@ -64,6 +64,7 @@ std::vector<std::shared_ptr<DocumentListController>> DocumentListController::lis
     const std::vector<TitledFolder>& folders)
 {
     std::vector<std::shared_ptr<DocumentListController>> lists;
+    lists.reserve(folders.size());
     for (const auto& [folder, title] : folders)
         lists.push_back(initWithURLTitle(folder, title));
     return lists;

@@ -289,8 +289,11 @@ void GtkApplicationLoop::addActions()
 void GtkApplicationLoop::launch(std::optional<ShortcutItem> shortcut)
 {
     auto waiting = std::exchange(_waiting, {});
-    if (!shortcut && !waiting.empty() && (shortcut = shortcutOf(waiting.front())))
-        waiting.erase(waiting.begin());
+    if (!shortcut && !waiting.empty()) {
+        shortcut = shortcutOf(waiting.front());
+        if (shortcut)
+            waiting.erase(waiting.begin());
+    }
     gtk_widget_set_default_direction(
         platform::services().localization().isRightToLeft() ? GTK_TEXT_DIR_RTL : GTK_TEXT_DIR_LTR);
     auto size = storedSize(_stateFile);
