@@ -10,6 +10,7 @@
 #include "platform/Log.h"
 #include "preview/PreviewDetailsViewController.h"
 #include "prompts/UIUtils.h"
+#include "screens/list/DocumentListController.h"
 
 namespace tarrow {
 
@@ -27,6 +28,9 @@ void NavController::beginUndoHistory()
 
 void NavController::offerUndo(std::uint64_t number, const UndoEntry& entry)
 {
+    const auto list = getTopDocumentListController();
+    if (list && !entry.items.empty())
+        list->reveal(entry.items.front());
     if (const auto shown = window())
         shown->showNotice(
             entry.sentence, {localized("Undo"), weakly(_undoHistory, &UndoHistory::undo, number)});

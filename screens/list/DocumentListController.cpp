@@ -18,6 +18,7 @@
 #include "screens/list/DocumentSearch.h"
 #include "screens/list/FolderContents.h"
 
+#include <algorithm>
 #include <chrono>
 #include <utility>
 
@@ -28,6 +29,8 @@ namespace {
 /// The list shows that it is loading only after this time, because a short flash would disturb.
 constexpr auto loadingDelay = std::chrono::milliseconds(300);
 constexpr auto librarySettles = std::chrono::seconds(1);
+/// A listing that takes longer than this comes when the user already does something else.
+constexpr std::chrono::nanoseconds longestWait = std::chrono::seconds(5);
 
 void fill(kit::View& parent, const std::shared_ptr<kit::View>& view)
 {
@@ -211,6 +214,31 @@ void DocumentListController::viewDidAppear(bool animated)
         services().dispatch().mainQueue()->async(weakly(this, &DocumentListController::reportRemovalIfShown));
 }
 
+void DocumentListController::reveal(const Url& item)
+{
+    if (!_presentedURL || item.deletingLastPathComponent().path() != _presentedURL->path())
+        return;
+    _awaited = Awaited{item, {services().dispatch().now().nanoseconds + longestWait.count()}};
+    revealAwaited();
+}
+
+void DocumentListController::revealAwaited()
+{
+    if (!_awaited || !_rows || !_rows->rows())
+        return;
+    if (services().dispatch().now().nanoseconds > _awaited->until.nanoseconds)
+        return _awaited.reset();
+    const auto& ids = _rows->rows()->ids();
+    const auto found = std::ranges::find(ids, _rows->rows()->idFor(_awaited->item));
+    if (found == ids.end())
+        return;
+    _awaited.reset();
+    const auto row = static_cast<std::size_t>(found - ids.begin());
+    if (!_listView->visibleRows().contains(row))
+        _listView->scrollToRow(row, kit::RowPosition::Middle, true);
+    _listView->focusRow(row);
+}
+
 void DocumentListController::contentsDidChange(const FolderContentsUpdate& update)
 {
     const auto keepsAlive = self();
@@ -236,6 +264,7 @@ void DocumentListController::contentsDidChange(const FolderContentsUpdate& updat
             endPeekAtMissingItem(*update.rows);
     }
     showStateOfFolder();
+    revealAwaited();
     takeKeyboard();
     if (const auto told = delegate())
         told->documentListControllerItemsChanged(keepsAlive);

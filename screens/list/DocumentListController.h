@@ -5,6 +5,7 @@
 
 #include "kit/controllers/ViewController.h"
 #include "kit/views/ListViewDelegate.h"
+#include "platform/Date.h"
 #include "platform/Error.h"
 #include "platform/FolderSnapshot.h"
 #include "platform/Url.h"
@@ -137,6 +138,10 @@ public:
 
     /// Lists the folder again.
     void refresh();
+    /// Scrolls to an item that the user has just made or renamed and gives its row the keyboard, as soon as
+    /// the list has it. An item that does not come within some seconds is forgotten, and so is the one
+    /// before. Items of other folders are ignored.
+    void reveal(const Url& item);
 
     /// The order of the items. When the view is loaded it becomes the user's choice for this folder.
     const ListOrder& order() const { return _order; }
@@ -180,6 +185,7 @@ private:
     std::shared_ptr<DocumentListController> self();
     void contentsDidChange(const FolderContentsUpdate& update);
     void showStateOfFolder();
+    void revealAwaited();
     bool canMakeFolder() const;
     void offerSearch();
     /// Takes the keyboard focus once for each appearance, as soon as there are rows.
@@ -239,6 +245,12 @@ private:
     RefusedActions _refusedActions;
     ListOrder _order;
     bool _editing = false;
+    /// An item that is revealed when it comes, and until when it may come.
+    struct Awaited {
+        Url item;
+        platform::Date until;
+    };
+    std::optional<Awaited> _awaited;
     std::optional<ListingStage> _state; ///< the stage of the latest update; absent before the first
     std::optional<Error> _failure;
     bool _wasRemoved = false, _reportedRemoval = false, _hasTakenKeyboard = false;

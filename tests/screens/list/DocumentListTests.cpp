@@ -157,6 +157,31 @@ TEST_F(DocumentList, OffersTheOrdersInAMenu)
     EXPECT_EQ(list->selectedItemCount(), 0U);
 }
 
+TEST_F(DocumentList, RevealsWhatWasMadeWhenItComes)
+{
+    const auto list = shownList(drive.url("Stuff"));
+    HandLister::Entries entries;
+    for (int i = 0; i < 1000; ++i)
+        entries.push_back({"file " + std::to_string(i)});
+    deliver(list, entries);
+    const auto observer = std::make_shared<RecordingListObserver>();
+    list->listView()->setListObserver(observer);
+    list->reveal(drive.url("Elsewhere/new.txt"));
+    list->reveal(drive.url("Stuff/new.txt"));
+    EXPECT_THAT(observer->focused, testing::IsEmpty());
+    entries.push_back({"new.txt"});
+    deliver(list, entries);
+    EXPECT_EQ(observer->focused, std::vector<std::size_t>{1000});
+    deliver(list, entries);
+    EXPECT_EQ(observer->focused.size(), 1U) << "once";
+
+    list->reveal(drive.url("Stuff/late.txt"));
+    drive.dispatch->advance(6);
+    entries.push_back({"late.txt"});
+    deliver(list, entries);
+    EXPECT_EQ(observer->focused.size(), 1U) << "the user does something else by now";
+}
+
 TEST_F(DocumentList, ListsAnewWhenItIsPulled)
 {
     const auto list = shownList(drive.makeFolder("Stuff"));

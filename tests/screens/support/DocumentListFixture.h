@@ -68,12 +68,12 @@ struct RecordingListObserver : kit::ListViewObserver {
     void rowDidChange(ListView&, std::size_t index) override { changedRows.push_back(index); }
     void selectionDidChange(ListView&) override { }
     void scrollToRow(ListView&, std::size_t, kit::RowPosition, bool) override { }
-    void focusRow(ListView&, std::size_t) override { }
+    void focusRow(ListView&, std::size_t index) override { focused.push_back(index); }
     void refreshStateDidChange(ListView&) override { }
 
     int resets = 0;
     kit::ListChanges last;
-    std::vector<std::size_t> changedRows;
+    std::vector<std::size_t> changedRows, focused;
 };
 
 } // namespace testing_support
