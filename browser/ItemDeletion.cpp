@@ -29,6 +29,7 @@ void deleteItem(const Url& url, const ItemChange& change, DeletionOutcome& outco
 {
     op.info("Deleting item %@", url);
     auto error = FileUtils::remove(url, change.stillWanted());
+    outcome.deleted += !error;
     if (error && !change.wasTakenBack(*error)) {
         op.warning("Failed to delete URL %@: %{public}@", url, *error);
         failed(outcome, std::move(error));
@@ -53,6 +54,7 @@ void deleteLibrary(const Url& url, DeletionOutcome& outcome)
                 [&](const Url&) { error = containers().deleteContents(*container); });
         if (refused)
             error = refused;
+        outcome.deleted += !error;
         if (error) {
             op.warning("Failed to delete container %{public}@: %{public}@", container->identifier, *error);
             failed(outcome, std::move(error));

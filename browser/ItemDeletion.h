@@ -13,7 +13,7 @@ namespace tarrow {
 
 /// The outcome of a deletion.
 struct DeletionOutcome {
-    std::size_t failures = 0;
+    std::size_t failures = 0, deleted = 0;
     std::optional<Error> lastError; ///< absent when no failure answered an error
 };
 

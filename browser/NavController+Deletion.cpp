@@ -13,6 +13,7 @@
 #include "platform/Log.h"
 #include "platform/Weakly.h"
 #include "prompts/UIUtils.h"
+#include "screens/DisplayName.h"
 #include "screens/list/DocumentListController.h"
 
 namespace tarrow {
@@ -20,6 +21,18 @@ namespace tarrow {
 using platform::localized;
 using platform::localizedPlural;
 using platform::weakly;
+
+namespace {
+
+std::string deletedSentence(const std::vector<Url>& items, std::size_t deleted)
+{
+    // An app library has another name than its folder.
+    const bool hasName = items.size() == 1 && MenuEnableChecks::numContainersInURLArray(items) == 0;
+    return hasName ? localized("“%@” was deleted", {screens::displayName(items.front().lastPathComponent())})
+                   : localizedPlural(".DICT.ITEMS_DELETED.%d", {static_cast<std::int64_t>(deleted)});
+}
+
+} // namespace
 
 void NavController::showWarningAndDeleteDocument(const Sender&)
 {
@@ -88,7 +101,7 @@ void NavController::askBeforeDeletion(const std::optional<std::string>& message,
 void NavController::deleteConfirmed(
     const std::vector<Url>& urls, const Completion& finished, const AccountSession& asked)
 {
-    const auto showFailures = [asked](NavController& self, const DeletionOutcome& outcome) {
+    const auto showOutcome = [asked, urls](NavController& self, const DeletionOutcome& outcome) {
         self.changeEnded();
         if (!asked.isCurrent())
             return;
@@ -98,9 +111,11 @@ void NavController::deleteConfirmed(
         else if (failures > 1)
             UIUtils::showAlertMessageParentViewController(
                 localizedPlural(".DICT.CANNOT_DELETE_ITEMS.%d", {failures}), {}, self.topViewController());
+        else if (outcome.deleted > 0)
+            self.tell(deletedSentence(urls, outcome.deleted));
     };
     const auto change = ItemChange::begin(asked, urls, deleteItems,
-        [finished, show = weakly(this, showFailures)](const DeletionOutcome& outcome) {
+        [finished, show = weakly(this, showOutcome)](const DeletionOutcome& outcome) {
             call(finished);
             show(outcome);
         });

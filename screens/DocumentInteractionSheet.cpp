@@ -4,6 +4,7 @@
 #include "screens/DocumentInteractionSheet.h"
 
 #include "kit/controllers/AlertController.h"
+#include "kit/controllers/Window.h"
 #include "platform/DocumentSharing.h"
 #include "platform/FileSystem.h"
 #include "platform/Localization.h"
@@ -182,11 +183,20 @@ void DocumentInteractionSheet::sendByMail()
 void DocumentInteractionSheet::copyPath()
 {
     services().documentSharing().copyText(_url.path());
+    tell(localized("The path was copied"));
 }
 
 void DocumentInteractionSheet::copyLink()
 {
     services().documentSharing().copyText(linkToItem(_url));
+    tell(localized("The link was copied"));
+}
+
+void DocumentInteractionSheet::tell(const std::string& notice)
+{
+    const auto presenter = _presenter.lock();
+    if (const auto shown = presenter ? presenter->window() : nullptr)
+        shown->showNotice(notice);
 }
 
 void DocumentInteractionSheet::showInFileManager()

@@ -101,6 +101,7 @@ private:
     void sendByMail();
     void copyPath();
     void copyLink();
+    void tell(const std::string& notice);
     void showInFileManager();
     void print();
     void showFailure(const std::string& title, const std::string& message);

@@ -209,16 +209,14 @@ kit::Menu DocumentListController::menuFor(const RowItem& item)
             .image = {}});
     if (item.isPromise)
         addDownloadEntries(menu, _downloadVerbs, {item});
-    const auto refused = _refusedActions ? _refusedActions(item.url) : DocumentListActionSet();
     for (const auto& entry : menuEntries) {
         if (entry.action == DocumentListAction::Delete && !item.isPromise)
             addDownloadEntries(menu, _downloadVerbs, {item});
         if (entry.action == DocumentListAction::Delete && item.kind != FolderEntryKind::Library) {
             addTagsEntry(menu, {item.url});
-            if ((refused & actionBit(DocumentListAction::Delete)) == 0)
-                addTrashEntry(menu, {item.url});
+            addTrashEntry(menu, {item.url});
         }
-        if (!offers(entry.action, item.kind) || (refused & actionBit(entry.action)) != 0)
+        if (!offers(entry.action, item.kind) || refuses(entry.action, item.url))
             continue;
         auto chosen = weakly(this, &DocumentListController::perform, entry.action, item.url);
         menu.push_back({.title = localized(entry.title),
@@ -277,6 +275,11 @@ std::shared_ptr<kit::View> DocumentListController::anchorFor(const Url& url)
         return _listView;
     _rowAnchor->setFrame(*place);
     return _rowAnchor;
+}
+
+bool DocumentListController::refuses(DocumentListAction action, const Url& item) const
+{
+    return _refusedActions && (_refusedActions(item) & actionBit(action)) != 0;
 }
 
 bool DocumentListController::offers(DocumentListAction action, FolderEntryKind kind) const

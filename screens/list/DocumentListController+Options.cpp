@@ -8,6 +8,7 @@
 #include "screens/PlatformNames.h"
 #include "screens/list/DocumentListController.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace screens {
@@ -64,7 +65,8 @@ void DocumentListController::addTagsEntry(kit::Menu& menu, std::vector<Url> item
 
 void DocumentListController::addTrashEntry(kit::Menu& menu, std::vector<Url> items) const
 {
-    if (_trashVerbs.moveToTrash && !items.empty())
+    const auto isRefused = [this](const Url& item) { return refuses(DocumentListAction::Delete, item); };
+    if (_trashVerbs.moveToTrash && !items.empty() && std::ranges::none_of(items, isRefused))
         menu.push_back({.title = localized("Move to Trash"),
             .handler = [move = _trashVerbs.moveToTrash, items = std::move(items)] { move(items); },
             .image = {}});

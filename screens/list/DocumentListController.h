@@ -219,6 +219,8 @@ private:
     void openFromPeek(const Url& url, FolderEntryKind kind);
     /// Answers whether an action is enabled and applies to this kind of item.
     bool offers(DocumentListAction action, FolderEntryKind kind) const;
+    /// Answers whether it would be refused for this item.
+    bool refuses(DocumentListAction action, const Url& item) const;
 
     std::optional<Url> _presentedURL;
     std::weak_ptr<kit::AlertController> _peek; ///< the latest peek

@@ -96,6 +96,12 @@ TEST_F(ItemActionsTest, AMenuLeavesOutWhatWouldBeRefused)
         EXPECT_TRUE(titles(row).contains("Info"));
     }
     EXPECT_EQ(items.size(), 3U);
+    browser->beginEditMode(nullptr);
+    for (const bool isSpecial : {true, false}) {
+        topList()->setSelectedItems({url("a.txt"), isSpecial ? url("Desktop") : url("a.txt")});
+        const auto menu = topList()->listView()->menuForList();
+        EXPECT_EQ(std::ranges::count(menu, "Move to Trash", &kit::MenuAction::title), isSpecial ? 0 : 1);
+    }
 }
 
 TEST_F(ItemActionsTest, AFolderIsMadeFromTheMenuAndFromAnEmptyFolder)
@@ -180,6 +186,11 @@ TEST_F(ItemActionsTest, ADeletionEndsWithTheAnswer)
     settle();
     EXPECT_EQ(completions, 2);
     EXPECT_FALSE(isThere("Budget.txt"));
+    EXPECT_THAT(takeNotices(), ElementsAre("“Budget.txt” was deleted"));
+    remove({write("a.txt"), write("b.txt")});
+    EXPECT_TRUE(alert()->press(0));
+    settle();
+    EXPECT_THAT(takeNotices(), ElementsAre("2 items were deleted"));
 }
 
 TEST_F(ItemActionsTest, FailedDeletionsAreCounted)
