@@ -27,7 +27,7 @@ public:
     struct Settings {
         std::vector<std::string> languages; ///< of the containers' names, the preferred language first
         std::string thumbnailFolder = ThumbnailCache::sharedFolder();
-        std::shared_ptr<const platform::ThumbnailMaker> thumbnailMaker; ///< null: only pictures get one
+        std::shared_ptr<const platform::ThumbnailMaker> thumbnailMaker = {}; ///< null: only pictures get one
         /// Says when the drive is put right after programs that were killed: before create() answers, or in
         /// the background, so that nothing waits for it.
         enum class PutRight : std::uint8_t { First, Beside } putRight = PutRight::First;
