@@ -39,12 +39,12 @@ public:
     /// A download that runs or waits.
     struct Entry {
         Url url;
-        std::optional<platform::DownloadProgress> progress; ///< nothing: it waits
+        std::optional<platform::DownloadProgress> progress; ///< absent while it waits
     };
     /// Answers those that run, and then those that wait, in the order in which they will run.
     std::vector<Entry> entries() const;
 
-    /// How far the downloads are that the user has asked for since none was left.
+    /// Counts the downloads that the user has asked for since none was left.
     struct Count {
         std::size_t done = 0, all = 0; ///< all is 0 while there are none
     };

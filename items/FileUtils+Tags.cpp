@@ -37,26 +37,42 @@ Result<Tags> editTags(const Url& url, const FileUtils::StillWanted& stillWanted,
     return before;
 }
 
-} // namespace
-
-Result<Tags> FileUtils::setTags(const Url& url, const Tags& tags, const StillWanted& stillWanted)
+bool has(const Tags& tags, const std::string& tag)
 {
-    static constexpr Operation op{"+[FileUtils setTags:]"};
-    return editTags(url, stillWanted, op, [&](const Tags&) { return tags; });
+    return std::ranges::find(tags, tag) != tags.end();
 }
+
+Tags changed(Tags tags, const Tags& added, const Tags& removed)
+{
+    std::erase_if(tags, [&](const std::string& tag) { return has(removed, tag); });
+    for (const auto& tag : added) {
+        if (!has(tags, tag))
+            tags.push_back(tag);
+    }
+    return tags;
+}
+
+} // namespace
 
 Result<Tags> FileUtils::changeTags(
     const Url& url, const Tags& added, const Tags& removed, const StillWanted& stillWanted)
 {
     static constexpr Operation op{"+[FileUtils changeTags:]"};
+    return editTags(
+        url, stillWanted, op, [&](Tags tags) { return changed(std::move(tags), added, removed); });
+}
+
+Result<Tags> FileUtils::changeTagsBack(const Url& url, const Tags& before, const Tags& added,
+    const Tags& removed, const StillWanted& stillWanted)
+{
+    static constexpr Operation op{"+[FileUtils changeTagsBack:]"};
     return editTags(url, stillWanted, op, [&](Tags tags) {
-        std::erase_if(
-            tags, [&](const std::string& tag) { return std::ranges::find(removed, tag) != removed.end(); });
-        for (const auto& tag : added) {
-            if (std::ranges::find(tags, tag) == tags.end())
-                tags.push_back(tag);
-        }
-        return tags;
+        if (tags == changed(before, added, removed))
+            return before;
+        Tags gone = added, back = removed;
+        std::erase_if(gone, [&](const std::string& tag) { return has(before, tag); });
+        std::erase_if(back, [&](const std::string& tag) { return !has(before, tag); });
+        return changed(std::move(tags), back, gone);
     });
 }
 

@@ -9,7 +9,7 @@
 
 namespace tarrow {
 
-/// Where the content of a document is.
+/// Says where the content of a document is.
 enum class ContentPlace {
     Here, ///< on this device
     Cloud, ///< only promised

@@ -63,25 +63,27 @@ void TagEditing::apply(const TagEdit& edit)
         return outcome;
     };
     ItemChange::begin(_asked, _items, work,
-        [self = shared_from_this(), expected = UndoHistory::expect(_history.lock(), _asked)](
+        [self = shared_from_this(), expected = UndoHistory::expect(_history.lock(), _asked), edit](
             const Outcome& outcome) {
             if (!outcome.changed.empty())
-                expected->add(undoOf(outcome.changed));
+                expected->add(undoOf(outcome.changed, edit));
             self->showErrors(outcome.errors);
         });
 }
 
-/// The items get back the tags that each of them had.
-UndoEntry TagEditing::undoOf(const std::vector<Tagged>& changed)
+/// The items get back the tags that each of them had. Tags that were changed since stay as they are.
+UndoEntry TagEditing::undoOf(const std::vector<Tagged>& changed, const TagEdit& edit)
 {
     std::vector<Url> items;
     for (const auto& tagged : changed)
         items.push_back(tagged.item);
     const auto count = static_cast<std::int64_t>(changed.size());
-    const auto changeBack = [changed](ItemChange& change) {
+    const auto changeBack = [changed, edit](ItemChange& change) {
         auto next = changed.begin();
         return change.forEachItem([&](const Url& item) {
-            return FileUtils::setTags(item, (next++)->tagsBefore, change.stillWanted()).error;
+            return FileUtils::changeTagsBack(
+                item, (next++)->tagsBefore, edit.added, edit.removed, change.stillWanted())
+                .error;
         });
     };
     return {localizedPlural(".DICT.TAGS_CHANGED.%d", {count}), std::move(items), changeBack};

@@ -45,7 +45,7 @@ private:
 
     void show(TagLists tagsOfItems);
     void apply(const TagEdit& edit);
-    static UndoEntry undoOf(const std::vector<Tagged>& changed);
+    static UndoEntry undoOf(const std::vector<Tagged>& changed, const TagEdit& edit);
     void showErrors(const std::vector<platform::Error>& errors) const;
 
     const AccountSession _asked;

@@ -39,14 +39,15 @@ TEST_F(FileUtilsTest, ChangesTagsInACoordinatedWriteThatCanBeUndone)
     EXPECT_EQ(before.value, (Tags{"Old", "Work"}));
     EXPECT_THAT(tags(document), ElementsAre("Work", "Red"));
     const auto reference = writeReference("pointer.trwref", "BrindleDefault", "a.txt");
-    EXPECT_TRUE(FileUtils::setTags(reference, *before));
+    EXPECT_TRUE(FileUtils::changeTagsBack(reference, *before, {"Red", "Work"}, {"Old", "Blue"}));
     EXPECT_THAT(tags(document), ElementsAre("Old", "Work")) << "those of what the reference stands for";
 
-    const auto unwanted = FileUtils::setTags(document, {}, [] { return false; });
+    const auto unwanted = FileUtils::changeTags(document, {"Red"}, {}, [] { return false; });
     EXPECT_TRUE(unwanted.error->is(FileErrorCode::Cancelled));
     const auto reading =
         fileCoordinator->coordinateReading(document, platform::ReadingOptions::None, [&](const Url&) {
-            EXPECT_EQ(FileUtils::setTags(document, {}).error->code(), EDEADLK) << "somebody reads it";
+            EXPECT_EQ(FileUtils::changeTags(document, {"Red"}, {}).error->code(), EDEADLK)
+                << "somebody reads it";
         });
     EXPECT_FALSE(reading);
     EXPECT_THAT(tags(document), ElementsAre("Old", "Work"));

@@ -5,6 +5,7 @@
 #include "prompts/TagsPrompt.h"
 
 #include "items/DRItem.h"
+#include "items/FileUtils.h"
 #include "kit/controllers/AlertController.h"
 #include "kit/controllers/NavigationItem.h"
 #include "kit/controllers/Window.h"
@@ -181,6 +182,20 @@ TEST_F(EditingTags, ChangesWhatIsHereAndWhatIsPromisedAndTakesItBack)
     EXPECT_THAT(tags(here), ElementsAre("Red"));
     EXPECT_THAT(tags(promised), ElementsAre("Red", "Work"));
     EXPECT_FALSE(screen->presentedViewController());
+}
+
+TEST_F(EditingTags, TakenBackKeepsWhatWasChangedSince)
+{
+    const auto prompt = begin();
+    ASSERT_TRUE(prompt);
+    prompt->listView()->activateRow(0);
+    prompt->nameField()->userEdited("New", {});
+    done(*prompt);
+    ASSERT_TRUE(FileUtils::changeTags(here, {"Later"}, {}));
+    history->undoLatest();
+    drive.dispatch->runUntilIdle();
+    EXPECT_THAT(tags(here), ElementsAre("Later", "Red"));
+    EXPECT_THAT(tags(promised), ElementsAre("Red", "Work"));
 }
 
 TEST_F(EditingTags, SaysWhatCouldNotBeChangedAndNothingAfterASignOut)

@@ -23,7 +23,7 @@ using sweep_tests::FileCall;
 using sweep_tests::FileSystems;
 using sweep_tests::MountedDisk;
 
-/// What other programs do with the disk while the operation runs.
+/// Says what other programs do with the disk while the operation runs.
 enum class Others { AreQuiet, SyncTheirFiles };
 
 /// Runs an operation on a disk of its own, copies the disk at each moment at which something reaches it, and
