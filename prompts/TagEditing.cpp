@@ -75,6 +75,7 @@ void TagEditing::apply(const TagEdit& edit)
 UndoEntry TagEditing::undoOf(const std::vector<Tagged>& changed, const TagEdit& edit)
 {
     std::vector<Url> items;
+    items.reserve(changed.size());
     for (const auto& tagged : changed)
         items.push_back(tagged.item);
     const auto count = static_cast<std::int64_t>(changed.size());
