@@ -54,6 +54,12 @@ Tags changed(Tags tags, const Tags& added, const Tags& removed)
 
 } // namespace
 
+Result<Tags> FileUtils::setTags(const Url& url, const Tags& tags, const StillWanted& stillWanted)
+{
+    static constexpr Operation op{"+[FileUtils setTags:]"};
+    return editTags(url, stillWanted, op, [&](const Tags&) { return tags; });
+}
+
 Result<Tags> FileUtils::changeTags(
     const Url& url, const Tags& added, const Tags& removed, const StillWanted& stillWanted)
 {

@@ -77,12 +77,14 @@ public:
     /// at a file's new location or a file at a folder's.
     static std::optional<Error> moveTo(
         const Url& source, const Url& destination, const StillWanted& stillWanted = {});
-    /// Adds tags to an item and takes some away, or takes such a change back. Both answer the tags before,
-    /// which changeTagsBack() needs. It gives an item that still has the tags of the change the ones before,
-    /// in their order; tags that were changed since stay as they are. The item may be only promised; for a
-    /// reference the document that it stands for gets them. Tags that cannot be are
-    /// FileErrorCode::InvalidName, items that can have none FileErrorCode::Unsupported, and a change is given
-    /// up when the item changes all the time (EBUSY).
+    /// Gives an item other tags in place of its own, adds tags and takes some away, or takes such a change
+    /// back. All answer the tags before, which changeTagsBack() needs. The last gives an item that still has
+    /// the tags of the change the ones before, in their order; tags that were changed since stay as they are.
+    /// The item may be only promised; for a reference the document that it stands for gets them. Tags that
+    /// cannot be are FileErrorCode::InvalidName, items that can have none FileErrorCode::Unsupported, and a
+    /// change is given up when the item changes all the time (EBUSY).
+    static Result<std::vector<std::string>> setTags(
+        const Url& url, const std::vector<std::string>& tags, const StillWanted& stillWanted = {});
     static Result<std::vector<std::string>> changeTags(const Url& url, const std::vector<std::string>& added,
         const std::vector<std::string>& removed, const StillWanted& stillWanted = {});
     static Result<std::vector<std::string>> changeTagsBack(const Url& url,
