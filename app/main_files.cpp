@@ -227,6 +227,8 @@ int run(std::string_view command, const std::vector<Url>& urls, host::system::GL
         return listTrash();
     if (command == "move" && urls.size() == 2)
         return report(FileUtils::moveTo(urls[0], urls[1]));
+    if (command == "copy" && urls.size() == 2)
+        return report(FileUtils::copyTo(urls[0], urls[1]));
     if (command == "save" && urls.size() == 2)
         return save(urls[0], urls[1]);
     if (command == "add" && urls.size() == 2)
@@ -269,10 +271,10 @@ int main(int argc, char** argv)
         : arguments.size() > 1  ? run(arguments[1], urls, *dispatch)
                                 : 2;
     if (status == 2)
-        std::fputs(
-            "usage: tarrow-files list [PATH] | mkdir|remove|evict|fetch|docid|trash PATH | move FROM TO | "
-            "save|add PATH FROM | tag PATH [TAG...] | resolve ID | trashed | restore|drop NAME | "
-            "remove-library NAME\n",
+        std::fputs("usage: tarrow-files list [PATH] | mkdir|remove|evict|fetch|docid|trash PATH | move|copy "
+                   "FROM TO | "
+                   "save|add PATH FROM | tag PATH [TAG...] | resolve ID | trashed | restore|drop NAME | "
+                   "remove-library NAME\n",
             stderr);
     platform::installServices({});
     return status;

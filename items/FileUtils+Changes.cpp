@@ -170,6 +170,25 @@ std::optional<Error> FileUtils::moveTo(
     return result;
 }
 
+std::optional<Error> FileUtils::copyTo(
+    const Url& source, const Url& destination, const StillWanted& stillWanted)
+{
+    static constexpr Operation op{"+[FileUtils copy:to:]"};
+    op.debug("Copying '%@' to '%@'", source, destination);
+    const auto goesOn = [&] { return !stillWanted || stillWanted(); };
+    std::optional<Error> failed;
+    const auto refused =
+        coordinator().coordinateWriting(destination, WritingOptions::None, [&](const Url& location) {
+            failed = refuseUnwanted(stillWanted);
+            if (!failed)
+                failed = changes().addCopy(source.path(), location.path(), goesOn);
+        });
+    auto result = refused ? refused : failed;
+    if (result)
+        op.warning("Copy failed: %@", *result);
+    return result;
+}
+
 std::optional<Error> FileUtils::evict(const Url& url)
 {
     static constexpr Operation op{"+[FileUtils evictDocument:]"};

@@ -77,6 +77,10 @@ public:
     /// at a file's new location or a file at a folder's.
     static std::optional<Error> moveTo(
         const Url& source, const Url& destination, const StillWanted& stillWanted = {});
+    /// Copies an item from anywhere on this machine to a location of the drive, see
+    /// platform::FileChanges::addCopy(). It asks `stillWanted` on the way, too.
+    static std::optional<Error> copyTo(
+        const Url& source, const Url& destination, const StillWanted& stillWanted = {});
     /// Gives an item other tags in place of its own, adds tags and takes some away, or takes such a change
     /// back. All answer the tags before, which changeTagsBack() needs. The last gives an item that still has
     /// the tags of the change the ones before, in their order; tags that were changed since stay as they are.

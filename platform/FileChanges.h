@@ -100,6 +100,16 @@ public:
     /// document that cannot be made whole leaves nothing.
     virtual std::optional<Error> addDocument(
         const std::string& path, const std::string& like, std::string_view content) = 0;
+    /// Copies an item from anywhere on this machine to a location of the drive: a folder with everything in
+    /// it, a link as a link. The copy is whole and on the disk when it gets its name, nothing is ever
+    /// replaced (FileErrorCode::ItemExists), and an item that cannot be copied whole leaves nothing. The copy
+    /// has the contents, dates, tags and access of its original, but its user may always change it, and it is
+    /// an item of its own. `goesOn` is asked many times on the way. Errors: FileErrorCode::Cancelled when it
+    /// answers false, and when another program changes the item meanwhile; FileErrorCode::Unsupported for a
+    /// folder that would come to lie in itself, for what is still in the cloud, and for what is neither a
+    /// document nor a folder nor a link.
+    virtual std::optional<Error> addCopy(
+        const std::string& from, const std::string& to, const std::function<bool()>& goesOn) = 0;
 };
 
 } // namespace platform

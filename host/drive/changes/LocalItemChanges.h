@@ -49,6 +49,8 @@ public:
         const std::string& path, const TagEdit& edit) override;
     std::optional<platform::Error> addDocument(
         const std::string& path, const std::string& like, std::string_view content) override;
+    std::optional<platform::Error> addCopy(
+        const std::string& from, const std::string& to, const std::function<bool()>& goesOn) override;
 
     // These work on places that somebody has opened, which may lie in the trash. ECANCELED means that the
     // item is not the one that was located any more.

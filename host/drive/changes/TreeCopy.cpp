@@ -72,6 +72,44 @@ bool isSamePromise(const FileDescriptor& a, const FileDescriptor& b)
     return first && second && *first == *second;
 }
 
+/// Answers the access of a copy: that of its original, but no more than others have to what the user makes,
+/// and the user's own always.
+mode_t rightsOfNew(mode_t original, mode_t fresh)
+{
+    constexpr mode_t mayRead = S_IRUSR | S_IRGRP | S_IROTH, all = S_IRWXU | S_IRWXG | S_IRWXO;
+    if (S_ISDIR(original))
+        return (original & fresh & all) | S_IRWXU;
+    const auto rights = (original & fresh & all) | S_IRUSR | S_IWUSR;
+    return (original & S_IXUSR) != 0 ? rights | ((rights & mayRead) >> 2) : rights;
+}
+
+/// Finishes a copy that is an item of its own. The drive's attributes belong to the original.
+SystemError finishAsNew(const FileDescriptor& from, const FileDescriptor& to, const struct stat& status)
+{
+    struct stat fresh;
+    if (::fstat(to.get(), &fresh) != 0)
+        return SystemError::last();
+    auto traits = ItemTraits::read(from);
+    if (!traits)
+        return traits.error;
+    std::erase_if(traits->attributes, [](const auto& attribute) {
+        const std::string_view name = attribute.first;
+        return !name.starts_with("user.") || name.starts_with("user.tarrow.")
+            || name.starts_with("user.trw.");
+    });
+    traits->owner = fresh.st_uid;
+    traits->group = fresh.st_gid;
+    traits->mode = rightsOfNew(status.st_mode, fresh.st_mode);
+    TRW_TRY(traits->write(to));
+    const timespec times[] = {status.st_atim, status.st_mtim};
+    if (::futimens(to.get(), times) != 0 || ::fsync(to.get()) != 0)
+        return SystemError::last();
+    struct stat now;
+    if (::fstat(from.get(), &now) != 0)
+        return SystemError::last();
+    return versionOf(now) == versionOf(status) ? SystemError() : SystemError(ECANCELED);
+}
+
 using Piece = std::array<char, 64 * 1024>;
 
 SystemResult<std::size_t> readPiece(const FileDescriptor& file, Piece& piece)
@@ -91,13 +129,27 @@ SystemResult<std::size_t> readPiece(const FileDescriptor& file, Piece& piece)
 /// A copy that is under way.
 struct Copying {
     const CopyProgress& copied;
+    bool isNew = false; ///< it is an item of its own
     std::uint64_t done = 0; ///< bytes of whole files
 
     SystemError tell(std::uint64_t ofThisFile) const
     {
         return copied ? copied(done + ofThisFile) : SystemError();
     }
+    /// Answers the access of what is made; what gets the access of its original is private until then.
+    mode_t rights(mode_t ofNew) const { return isNew ? ofNew : ofNew & S_IRWXU; }
 };
+
+SystemError copyContent(const FileDescriptor& from, const FileDescriptor& to, Copying& copying)
+{
+    std::uint64_t bytes = 0;
+    TRW_TRY(copyBytes(from, to, [&](std::uint64_t ofThisFile) {
+        bytes = ofThisFile;
+        return copying.tell(bytes);
+    }));
+    copying.done += bytes;
+    return {};
+}
 
 SystemError copyFile(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
     const std::string& newName, Copying& copying)
@@ -109,26 +161,14 @@ SystemError copyFile(const FileDescriptor& folder, const std::string& name, cons
     if (!S_ISREG(status.st_mode))
         return {EOPNOTSUPP, name};
     const FileDescriptor to(
-        ::openat(target.get(), newName.c_str(), O_RDWR | O_CREAT | O_EXCL | openFlags, S_IRUSR | S_IWUSR));
+        ::openat(target.get(), newName.c_str(), O_RDWR | O_CREAT | O_EXCL | openFlags, copying.rights(0666)));
     if (!to)
         return SystemError::last(newName);
-    std::uint64_t bytes = 0;
-    TRW_TRY(copyBytes(from, to, [&](std::uint64_t ofThisFile) {
-        bytes = ofThisFile;
-        return copying.tell(bytes);
-    }));
+    TRW_TRY(copyContent(from, to, copying));
+    if (copying.isNew)
+        return finishAsNew(from, to, status);
     TRW_TRY(finish(from, to, status));
-    copying.done += bytes;
     return compareBytes(from, to);
-}
-
-SystemError copyLink(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
-    const std::string& newName)
-{
-    std::array<char, 4096> destination{};
-    const auto length = ::readlinkat(folder.get(), name.c_str(), destination.data(), destination.size() - 1);
-    return SystemError::unless(
-        length >= 0 && ::symlinkat(destination.data(), target.get(), newName.c_str()) == 0, name);
 }
 
 SystemError copyItem(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
@@ -153,13 +193,13 @@ SystemError copyFolder(const FileDescriptor& folder, const std::string& name, co
     struct stat status;
     if (::fstat(from->get(), &status) != 0)
         return SystemError::last(name);
-    if (::mkdirat(target.get(), newName.c_str(), S_IRWXU) != 0)
+    if (::mkdirat(target.get(), newName.c_str(), copying.rights(0777)) != 0)
         return SystemError::last(newName);
     const auto to = openSubfolder(target, newName);
     if (!to)
         return to.error;
     TRW_TRY(copyAll(*from, *to, level + 1, copying));
-    return finish(*from, *to, status);
+    return copying.isNew ? finishAsNew(*from, *to, status) : finish(*from, *to, status);
 }
 
 SystemError copyItem(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
@@ -170,6 +210,8 @@ SystemError copyItem(const FileDescriptor& folder, const std::string& name, cons
         return found.error;
     if (level >= mostLevels)
         return {ELOOP, name};
+    if (copying.isNew && isReservedName(name))
+        return {ECANCELED, name};
     TRW_TRY(copying.tell(0));
     if (S_ISDIR(found->st_mode))
         return copyFolder(folder, name, target, newName, level, copying);
@@ -307,6 +349,25 @@ SystemError copyContents(
 {
     Copying copying{copied};
     return copyAll(folder, target, 1, copying);
+}
+
+SystemError copyAsNew(const FileDescriptor& from, const FileDescriptor& to, const CopyProgress& copied)
+{
+    struct stat status;
+    if (::fstat(from.get(), &status) != 0)
+        return SystemError::last();
+    Copying copying{copied, true};
+    TRW_TRY(S_ISDIR(status.st_mode) ? copyAll(from, to, 1, copying) : copyContent(from, to, copying));
+    return finishAsNew(from, to, status);
+}
+
+SystemError copyLink(const FileDescriptor& folder, const std::string& name, const FileDescriptor& target,
+    const std::string& newName)
+{
+    std::array<char, 4096> destination{};
+    const auto length = ::readlinkat(folder.get(), name.c_str(), destination.data(), destination.size() - 1);
+    return SystemError::unless(
+        length >= 0 && ::symlinkat(destination.data(), target.get(), newName.c_str()) == 0, name);
 }
 
 SystemResult<std::uint64_t> checkCopyable(const FileDescriptor& folder, const std::string& name)

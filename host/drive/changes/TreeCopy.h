@@ -26,6 +26,16 @@ system::SystemError copyTree(const system::FileDescriptor& folder, const std::st
 /// folder itself. `copied` may be empty; it is told of each item, and after each piece of at most 64 KiB.
 system::SystemError copyContents(
     const system::FileDescriptor& folder, const system::FileDescriptor& target, const CopyProgress& copied);
+/// Copies what an open file or folder holds into an open empty one of the same kind, which becomes an item of
+/// its own: it has the dates, the tags and the access of the original as far as others have access to what
+/// the user makes, and nothing by which the drive tells items apart. The files are synced, but not compared.
+/// Errors: those of copyTree(), and ECANCELED when the original changes meanwhile or holds a name that the
+/// drive needs for itself.
+system::SystemError copyAsNew(
+    const system::FileDescriptor& from, const system::FileDescriptor& to, const CopyProgress& copied);
+/// Makes a link that leads where another one does.
+system::SystemError copyLink(const system::FileDescriptor& folder, const std::string& name,
+    const system::FileDescriptor& target, const std::string& newName);
 /// Checks whether an item could be copied with everything in it, as far as that can be told without trying,
 /// and answers the bytes of all files. Errors: those of copyTree(), and EACCES for what may not be read.
 system::SystemResult<std::uint64_t> checkCopyable(

@@ -74,6 +74,9 @@ std::vector<Operation> operations()
         {"shortenLong", {"move", longPromise, "inner/new.txt"}},
         {"lengthenPromise", {"move", "inner/p.txt", longDocument + "x"}},
         {"docid", {"docid", "inner/file.txt"}}, {"docidPromise", {"docid", "inner/p.txt"}},
+        {"copyFile", {"copy", "inner/file.txt", "target/new.txt"}},
+        {"copyPackage", {"copy", package, "target/new.textbundle"}},
+        {"copyLink", {"copy", "folder/sub/link", "target/new"}},
         {"add", {"add", "target/new.txt", "folder/a.txt"}}, {"removeLibrary", {"remove-library", library}}};
 }
 
