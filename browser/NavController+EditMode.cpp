@@ -53,6 +53,12 @@ bool canMakeFolderIn(const DocumentListController& list)
     return MenuEnableChecks::isPlaceKnown(list) && MenuEnableChecks::canEnableNewFolderForSelectedItems(list);
 }
 
+/// Answers the same for files that are copied into it.
+bool canAddItemsTo(const DocumentListController& list)
+{
+    return MenuEnableChecks::isPlaceKnown(list) && MenuEnableChecks::canAddItems(list);
+}
+
 screens::DocumentListActionSet refusedActions(const platform::Url& item)
 {
     constexpr auto changes = actionBit(DocumentListAction::Delete) | actionBit(DocumentListAction::Rename)
@@ -73,8 +79,10 @@ void NavController::initNewListController(const List& list)
     const bool isRoot = viewControllers().empty() || viewControllers().front() == list;
     list->setTrashVerbs({weakly(this, &NavController::moveItemsToTrash),
         isRoot ? std::function<void()>(weakly(this, &NavController::showTrash)) : nullptr});
-    list->setFolderMaking({weaklyOr(false, list.get(), &canMakeFolderIn),
-        weakly(this, &NavController::promtForNewFolderAndCreate, nullptr)});
+    list->setFolderVerbs({{platform::localized("New Folder"), weaklyOr(false, list.get(), &canMakeFolderIn),
+                              weakly(this, &NavController::promtForNewFolderAndCreate, nullptr)},
+        {platform::localized("Add Files…"), weaklyOr(false, list.get(), &canAddItemsTo),
+            weakly(this, &NavController::chooseFilesToAdd)}});
     list->setRefusedActions(refusedActions);
     configureNavBar(list);
     if (list->title().empty())
@@ -91,7 +99,7 @@ void NavController::placeBecameKnown(const std::weak_ptr<DocumentListController>
 {
     const auto list = known.lock();
     if (list)
-        list->folderMakingMayHaveChanged();
+        list->folderVerbsMayHaveChanged();
     if (_editMode && list == topViewController()) {
         enableNewFolder(*list);
         updateStatusUI(list);

@@ -49,6 +49,7 @@ struct FoundDocuments;
 struct RemovedDownloads;
 class TrashScreen;
 struct TrashingOutcome;
+struct AddingOutcome;
 class UndoHistory;
 struct UndoEntry;
 struct UndoOutcome;
@@ -206,6 +207,10 @@ public:
         const List& list, const std::vector<std::string>& names) override;
 
     // These act on items. Every change runs on the queue that all changes share, see ItemChange.
+    /// Lets the user choose files, and copies them into the folder of the list on top.
+    void chooseFilesToAdd();
+    /// Copies items from anywhere on this machine into the folder of the list on top.
+    void addItems(const std::vector<platform::Url>& items);
     /// Asks for the name of a new folder in the folder of the list on top.
     void promtForNewFolderAndCreate(const Sender& sender);
     /// Asks for the name of a new folder, creates it and moves items into it.
@@ -310,6 +315,8 @@ private:
     void showRunningChanges(const List& list);
     void showProgress(const List& list);
     void showInLists(void (NavController::*show)(const List&));
+    void addItemsTo(const List& list, const std::vector<platform::Url>& items, const AccountSession& asked);
+    void addingEnded(const AddingOutcome& outcome);
     void makeFolderForItems(
         const platform::Url& folder, const std::vector<platform::Url>& items, const AccountSession& asked);
     void renameConfirmed(const platform::Url& url, const std::string& name, const AccountSession& asked);

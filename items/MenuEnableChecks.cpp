@@ -204,6 +204,12 @@ bool MenuEnableChecks::canEnableNewFolderForSelectedItems(const List& list)
     return !levels || *levels == folderLevels::any || (*levels == folderLevels::one && depth == 0);
 }
 
+bool MenuEnableChecks::canAddItems(const List& list)
+{
+    static constexpr Operation op{"+[MenuEnableChecks canAddItems:]"};
+    return placeOf(list, op).container != nullptr;
+}
+
 bool MenuEnableChecks::containerSupportsAnyDepth(const List& list)
 {
     static constexpr Operation op{"+[MenuEnableChecks containerSupportsAnyDepth:]"};

@@ -26,7 +26,7 @@ public:
 
     MenuEnableChecks() = delete;
 
-    /// Looks up on another thread what the first four questions need to know of a list's folder, keeps it
+    /// Looks up on another thread what the first five questions need to know of a list's folder, keeps it
     /// with the list, and calls `done`. Without it they look at the disk themselves.
     static void lookUpPlaceOf(const std::shared_ptr<List>& list, std::function<void()> done);
     /// Answers whether that is known, so that the questions are answered from memory.
@@ -39,6 +39,9 @@ public:
     static bool canShowDeleteForSelectedItems(const List& list);
     /// Answers whether a new folder may be made in the list's folder. The selection does not matter.
     static bool canEnableNewFolderForSelectedItems(const List& list);
+    /// Answers whether files may be copied into the list's folder; folders may be when the container supports
+    /// any depth.
+    static bool canAddItems(const List& list);
     /// Answers whether the container of the list's folder allows folders within folders.
     static bool containerSupportsAnyDepth(const List& list);
 

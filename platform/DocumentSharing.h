@@ -10,6 +10,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace platform {
 
@@ -21,7 +22,8 @@ inline constexpr std::string_view applicationScheme = "tarrowdriveapp";
 /// the path of this URL and once as the path of the item's own. Any thread.
 std::string linkToItem(const Url& item);
 
-/// Hands documents to other programs of the desktop. Main thread only; no call waits for another program.
+/// Hands documents to other programs of the desktop, and takes files from them. Main thread only; no call
+/// waits for another program.
 class DocumentSharing {
 public:
     /// Called once, on the main thread, after the call that it was given to has returned: with an error when
@@ -31,6 +33,11 @@ public:
     using Completion = std::function<void(std::optional<Error>)>;
 
     virtual ~DocumentSharing() = default;
+
+    /// Lets the person choose files of this machine. `chosen` is called once, later, with the local ones
+    /// among what was chosen; with none when the person thought better of it.
+    using Chosen = std::function<void(const std::vector<Url>& files)>;
+    virtual void chooseFiles(Chosen chosen) = 0;
 
     /// Puts a text on the clipboard. Without a display nothing happens.
     virtual void copyText(const std::string& text) = 0;

@@ -47,7 +47,7 @@ struct ServiceSet {
     std::shared_ptr<CloudDocumentService> cloudDocumentService;
     /// Queues, timers and the clock.
     std::shared_ptr<Dispatch> dispatch;
-    /// Clipboard, mail, file manager and printer.
+    /// Clipboard, mail, file manager, file chooser and printer.
     std::shared_ptr<DocumentSharing> documentSharing;
     /// Changes of the drive's items.
     std::shared_ptr<FileChanges> fileChanges;

@@ -9,6 +9,7 @@
 #include "screens/list/DocumentListController.h"
 
 #include <algorithm>
+#include <iterator>
 #include <utility>
 
 namespace screens {
@@ -44,12 +45,15 @@ void DocumentListController::setOrder(const ListOrder& order)
     refresh();
 }
 
-bool DocumentListController::canMakeFolder() const
+std::vector<DocumentListController::FolderVerb> DocumentListController::possibleVerbs() const
 {
-    return _folderMaking.make && _folderMaking.isPossible();
+    std::vector<FolderVerb> possible;
+    std::ranges::copy_if(
+        _folderVerbs, std::back_inserter(possible), [](const FolderVerb& verb) { return verb.isPossible(); });
+    return possible;
 }
 
-void DocumentListController::folderMakingMayHaveChanged()
+void DocumentListController::folderVerbsMayHaveChanged()
 {
     if (_state && isViewLoaded())
         showStateOfFolder();
@@ -91,8 +95,10 @@ kit::Menu DocumentListController::optionsMenu()
         addTagsEntry(menu, selectedItems());
         addTrashEntry(menu, selectedItems());
     }
-    if (!_editing && canMakeFolder())
-        menu.push_back({.title = localized("New Folder"), .handler = _folderMaking.make});
+    if (!_editing) {
+        for (auto& verb : possibleVerbs())
+            menu.push_back({.title = std::move(verb.title), .handler = std::move(verb.run)});
+    }
     const auto firstChoice = menu.size();
     for (const auto& entry : keyEntries)
         choice(entry.title, _order.key == entry.key ? _order : _order.sortedBy(entry.key),

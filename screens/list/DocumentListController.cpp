@@ -289,8 +289,10 @@ void DocumentListController::showStateOfFolder()
         _placeholder->setContent({.iconName = "folder-open-symbolic",
             .title = localized("Folder is empty"),
             .message = localized("What you put into this folder appears here.")});
-        if (canMakeFolder())
-            _placeholder->setActions({{localized("New Folder"), _folderMaking.make}});
+        std::vector<PlaceholderView::Action> actions;
+        for (auto& verb : possibleVerbs())
+            actions.push_back({std::move(verb.title), std::move(verb.run)});
+        _placeholder->setActions(actions);
     }
 }
 

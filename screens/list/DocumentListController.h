@@ -104,15 +104,16 @@ public:
     };
     void setTrashVerbs(TrashVerbs verbs) { _trashVerbs = std::move(verbs); }
 
-    /// How the list makes a folder in its folder, which its menu and an empty list offer while `isPossible`
-    /// answers true.
-    struct FolderMaking {
+    /// What can be done in the list's folder, such as to make a folder. The list's menu and an empty list
+    /// offer it while `isPossible` answers true.
+    struct FolderVerb {
+        std::string title;
         std::function<bool()> isPossible;
-        std::function<void()> make;
+        std::function<void()> run;
     };
-    void setFolderMaking(FolderMaking making) { _folderMaking = std::move(making); }
+    void setFolderVerbs(std::vector<FolderVerb> verbs) { _folderVerbs = std::move(verbs); }
     /// Tells the list that `isPossible` may answer something else now.
-    void folderMakingMayHaveChanged();
+    void folderVerbsMayHaveChanged();
     /// Says which actions would be refused for an item, so that its menu leaves them out. The function looks
     /// at no disk. The keys still lead to the refusal, which says why.
     using RefusedActions = std::function<DocumentListActionSet(const Url& item)>;
@@ -186,7 +187,7 @@ private:
     void contentsDidChange(const FolderContentsUpdate& update);
     void showStateOfFolder();
     void revealAwaited();
-    bool canMakeFolder() const;
+    std::vector<FolderVerb> possibleVerbs() const;
     void offerSearch();
     /// Takes the keyboard focus once for each appearance, as soon as there are rows.
     void takeKeyboard();
@@ -243,7 +244,7 @@ private:
     EditTags _editTags;
     DownloadVerbs _downloadVerbs;
     TrashVerbs _trashVerbs;
-    FolderMaking _folderMaking;
+    std::vector<FolderVerb> _folderVerbs;
     RefusedActions _refusedActions;
     ListOrder _order;
     bool _editing = false;

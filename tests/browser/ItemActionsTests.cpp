@@ -110,7 +110,7 @@ TEST_F(ItemActionsTest, AFolderIsMadeFromTheMenuAndFromAnEmptyFolder)
     launch();
     ASSERT_TRUE(warp("Empty"));
     const auto list = topList();
-    ASSERT_EQ(list->placeholder()->buttons().size(), 1U);
+    ASSERT_EQ(list->placeholder()->buttons().size(), 2U);
     list->placeholder()->buttons().front()->press();
     EXPECT_EQ(enter("One"), "");
     EXPECT_TRUE(isThere("Empty/One"));

@@ -29,6 +29,9 @@ public:
         record("print", document, completion);
     }
 
+    void chooseFiles(Chosen chosen) override { asked = std::move(chosen); }
+
+    Chosen asked; ///< waits for the files that a person chooses
     bool hasMailer = true;
     std::optional<platform::Error> answer;
     std::vector<std::string> lines;

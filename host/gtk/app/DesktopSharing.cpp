@@ -4,6 +4,7 @@
 #include "host/gtk/app/DesktopSharing.h"
 
 #include "host/gtk/base/ObjectRef.h"
+#include "host/gtk/base/SignalConnection.h"
 #include "host/gtk/preview/PrintRun.h"
 #include "host/gtk/preview/PrintablePages.h"
 #include "host/system/texts/Translate.h"
@@ -87,6 +88,19 @@ GtkWindow* activeWindow()
                                            : nullptr;
 }
 
+/// Answers the files of a list that have a path on this machine.
+std::vector<Url> localFiles(GListModel* files)
+{
+    std::vector<Url> found;
+    for (guint i = 0; i < g_list_model_get_n_items(files); ++i) {
+        const auto file = ObjectRef<GFile>::adopt(G_FILE(g_list_model_get_item(files, i)));
+        const std::unique_ptr<char, decltype(&g_free)> path(g_file_get_path(file.get()), g_free);
+        if (path)
+            found.push_back(Url::fileURL(path.get()));
+    }
+    return found;
+}
+
 } // namespace
 
 DesktopSharing::DesktopSharing(
@@ -94,6 +108,26 @@ DesktopSharing::DesktopSharing(
     : _types(std::move(types))
     , _previews(std::move(previews))
 {
+}
+
+void DesktopSharing::chooseFiles(Chosen chosen)
+{
+    auto* chooser = gtk_file_chooser_native_new(translated("Add Files").c_str(), activeWindow(),
+        GTK_FILE_CHOOSER_ACTION_OPEN, translated("Add").c_str(), nullptr);
+    gtk_file_chooser_set_select_multiple(GTK_FILE_CHOOSER(chooser), TRUE);
+    gtk_native_dialog_set_modal(GTK_NATIVE_DIALOG(chooser), TRUE);
+    connectForLife<void(int)>(chooser, "response", [chooser, chosen = std::move(chosen)](int response) {
+        std::vector<Url> files;
+        if (response == GTK_RESPONSE_ACCEPT) {
+            const auto list =
+                ObjectRef<GListModel>::adopt(gtk_file_chooser_get_files(GTK_FILE_CHOOSER(chooser)));
+            files = localFiles(list.get());
+        }
+        const auto told = chosen;
+        g_object_unref(chooser);
+        told(files);
+    });
+    gtk_native_dialog_show(GTK_NATIVE_DIALOG(chooser));
 }
 
 void DesktopSharing::copyText(const std::string& text)

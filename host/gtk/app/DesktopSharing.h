@@ -26,6 +26,7 @@ public:
     DesktopSharing(
         std::shared_ptr<const platform::TypeRegistry> types, std::shared_ptr<const PreviewModule> previews);
 
+    void chooseFiles(Chosen chosen) override;
     void copyText(const std::string& text) override;
     bool canSendByMail() const override;
     void sendByMail(const platform::Url& document, Completion completion) override;
