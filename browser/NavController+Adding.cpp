@@ -34,6 +34,20 @@ void NavController::chooseFilesToAdd()
     services().documentSharing().chooseFiles(weakly(this, chosen));
 }
 
+bool NavController::takesFiles() const
+{
+    const auto list = getTopDocumentListController();
+    return list && list->presentedURL();
+}
+
+bool NavController::filesOffered(const std::vector<Url>& files)
+{
+    static constexpr Operation op{"-[NavController filesOffered:]"};
+    op.userAction("Dropped or pasted files");
+    addItems(files);
+    return !files.empty();
+}
+
 void NavController::addItems(const std::vector<Url>& items)
 {
     if (const auto list = getTopDocumentListController())

@@ -151,6 +151,10 @@ public:
     /// Undoes the latest change while a list or an item's details are on top.
     bool undoRequested() override;
 
+    /// What is dropped on a list or pasted is copied into its folder.
+    bool takesFiles() const override;
+    bool filesOffered(const std::vector<platform::Url>& files) override;
+
     /// Holds what is being downloaded.
     const std::shared_ptr<Downloads>& downloads() const { return _downloads; }
 

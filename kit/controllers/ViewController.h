@@ -103,6 +103,11 @@ public:
     /// Event up: the user asks by Ctrl+Z to undo the latest change, while no text has the keyboard focus.
     /// Answers false when there is nothing to undo, as by default.
     virtual bool undoRequested() { return false; }
+    /// Answers whether files of other programs may be dropped or pasted here; not by default.
+    virtual bool takesFiles() const { return false; }
+    /// Event up: the user drops or pastes files and folders, which lie anywhere on this machine. Answers
+    /// false when they are not taken.
+    virtual bool filesOffered(const std::vector<platform::Url>& /*files*/) { return false; }
 
     const std::string& restorationIdentifier() const
     {

@@ -158,6 +158,16 @@ bool Window::undoRequested()
     return _root && presentedScreens().empty() && _root->undoRequested();
 }
 
+bool Window::takesFiles() const
+{
+    return _root && presentedScreens().empty() && _root->takesFiles();
+}
+
+bool Window::filesOffered(const std::vector<platform::Url>& files)
+{
+    return takesFiles() && _root->filesOffered(files);
+}
+
 void Window::closed()
 {
     if (!_visible)

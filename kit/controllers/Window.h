@@ -11,6 +11,7 @@
 #include "kit/values/TraitCollection.h"
 #include "platform/Color.h"
 #include "platform/Geometry.h"
+#include "platform/Url.h"
 
 #include <functional>
 #include <memory>
@@ -59,6 +60,10 @@ public:
     bool backRequested();
     /// The user asks to undo the latest change. The root screen is asked, unless another screen lies over it.
     bool undoRequested();
+    /// Files are held over the window, and dropped on it or pasted. The root screen is asked, unless another
+    /// screen lies over it.
+    bool takesFiles() const;
+    bool filesOffered(const std::vector<platform::Url>& files);
     /// The window was closed, so its screens disappear.
     void closed();
 

@@ -1,6 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
+#include "host/drive/records/ContainerRecord.h"
 #include "kit/controllers/AlertController.h"
 #include "kit/controllers/Window.h"
 #include "kit/views/Button.h"
@@ -78,6 +79,43 @@ TEST_F(AddingTest, AnEmptyFolderOffersItToo)
     press()({outside("a.txt")});
     settle();
     EXPECT_THAT(takeNotices(), ElementsAre("“a.txt” was added to “Trip”"));
+}
+
+TEST_F(AddingTest, WhatIsDroppedOrPastedIsAddedWhereAListIsShown)
+{
+    write("a.txt");
+    launch();
+    ASSERT_TRUE(warp("Trip"));
+    outside("Photos/far/b.txt");
+    EXPECT_TRUE(window->takesFiles());
+    EXPECT_TRUE(window->filesOffered({Url::fileURL(drive.folder().at("outside/Photos")), url("a.txt")}));
+    settle();
+    EXPECT_TRUE(isThere("Trip/Photos/far/b.txt") && isThere("Trip/a.txt") && isThere("a.txt"));
+    browser->promtForNewFolderAndCreate(nullptr);
+    EXPECT_FALSE(window->takesFiles()) << "a question lies over the list";
+    EXPECT_FALSE(window->filesOffered({url("a.txt")}));
+    alert()->press(0);
+    settle();
+    ASSERT_TRUE(warp("a.txt", PreviewModeDetails));
+    EXPECT_FALSE(window->takesFiles());
+}
+
+TEST_F(AddingTest, AContainerWithoutFoldersTakesFilesAndPackages)
+{
+    host::drive::ContainerRecord description;
+    description.supportedFolderLevels = platform::folderLevels::none;
+    const auto documents = drive.makeContainer("Flat", description);
+    launch();
+    outside("Photos/a.txt");
+    outside("Note.textbundle/text.md");
+    ASSERT_TRUE(browser->warpToFolderForURL(documents));
+    settle();
+    const auto from = [&](const char* name) { return Url::fileURL(drive.folder().at(name)); };
+    add({from("outside/Photos"), from("outside/Note.textbundle"), outside("b.txt")});
+    EXPECT_THAT(takeAlert(), testing::StartsWith("“Photos” wasn’t added, because “"));
+    EXPECT_TRUE(std::filesystem::exists(documents.path() + "/Note.textbundle/text.md"));
+    EXPECT_TRUE(std::filesystem::exists(documents.path() + "/b.txt"));
+    EXPECT_FALSE(std::filesystem::exists(documents.path() + "/Photos"));
 }
 
 TEST_F(AddingTest, SaysWhatCouldNotBeAdded)

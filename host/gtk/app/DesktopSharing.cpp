@@ -3,6 +3,7 @@
 
 #include "host/gtk/app/DesktopSharing.h"
 
+#include "host/gtk/base/LocalFiles.h"
 #include "host/gtk/base/ObjectRef.h"
 #include "host/gtk/base/SignalConnection.h"
 #include "host/gtk/preview/PrintRun.h"
@@ -88,19 +89,6 @@ GtkWindow* activeWindow()
                                            : nullptr;
 }
 
-/// Answers the files of a list that have a path on this machine.
-std::vector<Url> localFiles(GListModel* files)
-{
-    std::vector<Url> found;
-    for (guint i = 0; i < g_list_model_get_n_items(files); ++i) {
-        const auto file = ObjectRef<GFile>::adopt(G_FILE(g_list_model_get_item(files, i)));
-        const std::unique_ptr<char, decltype(&g_free)> path(g_file_get_path(file.get()), g_free);
-        if (path)
-            found.push_back(Url::fileURL(path.get()));
-    }
-    return found;
-}
-
 } // namespace
 
 DesktopSharing::DesktopSharing(
@@ -121,7 +109,7 @@ void DesktopSharing::chooseFiles(Chosen chosen)
         if (response == GTK_RESPONSE_ACCEPT) {
             const auto list =
                 ObjectRef<GListModel>::adopt(gtk_file_chooser_get_files(GTK_FILE_CHOOSER(chooser)));
-            files = localFiles(list.get());
+            files = LocalFiles::of(list.get()).files;
         }
         const auto told = chosen;
         g_object_unref(chooser);

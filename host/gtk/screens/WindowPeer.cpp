@@ -5,6 +5,7 @@
 
 #include "host/gtk/preview/NotePeer.h"
 #include "host/gtk/preview/PreviewPeer.h"
+#include "host/gtk/screens/FileOffers.h"
 #include "host/gtk/screens/LayerFactory.h"
 #include "host/gtk/screens/ToastTitle.h"
 #include "kit/controllers/ViewController.h"
@@ -54,6 +55,7 @@ WindowPeer::WindowPeer(AdwApplication* application, const std::shared_ptr<kit::W
     connectWindow();
     connectInput();
     connectUndo();
+    connectFileOffers(_window.get(), window);
 }
 
 WindowPeer::~WindowPeer()

@@ -1,0 +1,24 @@
+// SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
+// SPDX-License-Identifier: GPL-3.0-or-later
+
+#pragma once
+
+#include "platform/Url.h"
+
+#include <gio/gio.h>
+
+#include <vector>
+
+namespace host::gtk {
+
+/// Files that a person chose in another program.
+struct LocalFiles {
+    std::vector<platform::Url> files; ///< those with a path on this machine
+    bool areAll = true; ///< false: others have none, and were left out
+
+    void add(GFile* file);
+    static LocalFiles of(GListModel* files);
+    static LocalFiles of(const GSList* files);
+};
+
+} // namespace host::gtk
