@@ -1,20 +1,23 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-// This file copies items from elsewhere on this machine into the folder that is shown.
+// This file copies items from elsewhere on this machine into the folder that is shown, and out of it.
 
 #include "browser/NavController.h"
 #include "items/ItemAdding.h"
+#include "items/ItemContents.h"
 #include "items/MenuEnableChecks.h"
 #include "platform/DocumentSharing.h"
 #include "platform/Localization.h"
 #include "platform/Log.h"
 #include "platform/Services.h"
 #include "prompts/UIUtils.h"
+#include "screens/DisplayName.h"
 #include "screens/list/DocumentListController.h"
 
 namespace tarrow {
 
+using platform::localized;
 using platform::localizedPlural;
 using platform::Operation;
 using platform::services;
@@ -86,6 +89,43 @@ void NavController::addingEnded(const AddingOutcome& outcome)
         UIUtils::showErrorsTitleParentViewController(outcome.errors,
             localizedPlural(".DICT.CANNOT_ADD_ITEMS.%d", {static_cast<std::int64_t>(outcome.errors.size())}),
             topViewController());
+}
+
+void NavController::copyItems(const std::vector<Url>& items)
+{
+    static constexpr Operation op{"-[NavController copyItems:]"};
+    op.userAction("Copy");
+    const AccountSession asked;
+    const auto look = [items, asked] {
+        return findDocuments(items, ContentPlace::Cloud, [&] { return asked.isSignedIn(); });
+    };
+    lookThen(look,
+        [items, asked](NavController& self, const FoundDocuments& inCloud) {
+            if (asked.isCurrent())
+                self.copyFound(items, inCloud);
+        },
+        {});
+}
+
+/// Another program would find nothing where a document is only promised.
+void NavController::copyFound(const std::vector<Url>& items, const FoundDocuments& inCloud)
+{
+    const auto top = visibleViewController();
+    if (!inCloud.errors.empty())
+        return UIUtils::showErrorParentViewController(inCloud.errors.front(), top);
+    const auto missing = static_cast<std::int64_t>(inCloud.documents.size());
+    if (missing == 1)
+        return UIUtils::showAlertMessageParentViewController(
+            localized("“%@” is still in the cloud, so it can’t be copied. Download it first.",
+                {screens::displayName(inCloud.documents.front().lastPathComponent())}),
+            {}, top);
+    if (missing > 0)
+        return UIUtils::showAlertMessageParentViewController(
+            localizedPlural(".DICT.CANNOT_COPY_CLOUD_ITEMS.%d", {missing}), {}, top);
+    services().documentSharing().copyFiles(items);
+    tell(items.size() == 1
+            ? localized("“%@” was copied", {screens::displayName(items.front().lastPathComponent())})
+            : localizedPlural(".DICT.ITEMS_COPIED.%d", {static_cast<std::int64_t>(items.size())}));
 }
 
 } // namespace tarrow

@@ -75,6 +75,7 @@ void NavController::initNewListController(const List& list)
     logNewList(list);
     list->setAvailableActions(offeredActions);
     list->setEditTags(weakly(this, &NavController::editTagsOfItems));
+    list->setCopyItems(weakly(this, &NavController::copyItems));
     list->setDownloadVerbs(downloadVerbs());
     const bool isRoot = viewControllers().empty() || viewControllers().front() == list;
     list->setTrashVerbs({weakly(this, &NavController::moveItemsToTrash),

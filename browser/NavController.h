@@ -215,6 +215,9 @@ public:
     void chooseFilesToAdd();
     /// Copies items from anywhere on this machine into the folder of the list on top.
     void addItems(const std::vector<platform::Url>& items);
+    /// Puts items on the clipboard, for other programs. What is in the cloud cannot be copied, and the user
+    /// is told.
+    void copyItems(const std::vector<platform::Url>& items);
     /// Asks for the name of a new folder in the folder of the list on top.
     void promtForNewFolderAndCreate(const Sender& sender);
     /// Asks for the name of a new folder, creates it and moves items into it.
@@ -320,6 +323,7 @@ private:
     void showProgress(const List& list);
     void showInLists(void (NavController::*show)(const List&));
     void addItemsTo(const List& list, const std::vector<platform::Url>& items, const AccountSession& asked);
+    void copyFound(const std::vector<platform::Url>& items, const FoundDocuments& inCloud);
     void addingEnded(const AddingOutcome& outcome);
     void makeFolderForItems(
         const platform::Url& folder, const std::vector<platform::Url>& items, const AccountSession& asked);

@@ -41,6 +41,9 @@ public:
 
     /// Puts a text on the clipboard. Without a display nothing happens.
     virtual void copyText(const std::string& text) = 0;
+    /// Puts files and folders on the clipboard, where file managers find them. The other program reads them
+    /// when it pastes, so they must be here.
+    virtual void copyFiles(const std::vector<Url>& files) = 0;
 
     /// Whether a mail program is set up that takes attachments. The answer may change while the program runs.
     virtual bool canSendByMail() const = 0;

@@ -224,8 +224,9 @@ Menu ListView::menuForList()
 bool ListView::commandRow(std::size_t index, RowCommand command)
 {
     const auto delegate = _listDelegate.lock();
-    // In selection mode only this key has a meaning: for the selected items.
-    const bool hasMeaning = _selectionMode == SelectionMode::None || command == RowCommand::Delete;
+    // In selection mode only these keys have a meaning: for the selected items.
+    const bool hasMeaning =
+        _selectionMode == SelectionMode::None || command == RowCommand::Delete || command == RowCommand::Copy;
     return delegate && isItem(index) && hasMeaning && delegate->rowCommand(*this, index, command);
 }
 

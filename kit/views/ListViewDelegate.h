@@ -13,7 +13,7 @@ namespace kit {
 class ListView;
 
 /// Keys that act on a row, other than the key that opens it.
-enum class RowCommand { Rename, Delete, DeleteForGood, Info, Peek };
+enum class RowCommand { Rename, Delete, DeleteForGood, Info, Peek, Copy };
 
 /// Is told what the user does with a list. Main thread only.
 class ListViewDelegate {

@@ -213,6 +213,9 @@ kit::Menu DocumentListController::menuFor(const RowItem& item)
         if (entry.action == DocumentListAction::Delete && !item.isPromise)
             addDownloadEntries(menu, _downloadVerbs, {item});
         if (entry.action == DocumentListAction::Delete && item.kind != FolderEntryKind::Library) {
+            // What is in the cloud can be downloaded first.
+            if (!item.isPromise)
+                addCopyEntry(menu, {item.url});
             addTagsEntry(menu, {item.url});
             addTrashEntry(menu, {item.url});
         }
@@ -296,16 +299,28 @@ bool DocumentListController::rowCommand(kit::ListView&, std::size_t index, kit::
     return item && obey(command, *item);
 }
 
-/// While several items are selected, the key at one of them moves all of them. Answers false for what does
-/// not go to the trash.
+std::vector<Url> DocumentListController::meantBy(const RowItem& item) const
+{
+    auto items = _editing ? selectedItems() : std::vector<Url>();
+    if (std::ranges::find(items, item.url) == items.end())
+        items = {item.url};
+    return items;
+}
+
+/// Answers false for what does not go to the trash.
 bool DocumentListController::moveToTrash(const RowItem& item)
 {
     if (!_trashVerbs.moveToTrash || item.kind == FolderEntryKind::Library)
         return false;
-    auto items = _editing ? selectedItems() : std::vector<Url>();
-    if (std::ranges::find(items, item.url) == items.end())
-        items = {item.url};
-    _trashVerbs.moveToTrash(items);
+    _trashVerbs.moveToTrash(meantBy(item));
+    return true;
+}
+
+bool DocumentListController::copy(const RowItem& item)
+{
+    if (!_copyItems || item.kind == FolderEntryKind::Library)
+        return false;
+    _copyItems(meantBy(item));
     return true;
 }
 
@@ -315,6 +330,8 @@ bool DocumentListController::obey(kit::RowCommand command, const RowItem& item)
         return peekAt(item);
     if (command == kit::RowCommand::Delete && moveToTrash(item))
         return true;
+    if (command == kit::RowCommand::Copy)
+        return copy(item);
     if (_editing)
         return false;
     constexpr std::pair<kit::RowCommand, DocumentListAction> actions[] = {

@@ -67,6 +67,14 @@ void DocumentListController::addTagsEntry(kit::Menu& menu, std::vector<Url> item
             .image = {}});
 }
 
+void DocumentListController::addCopyEntry(kit::Menu& menu, std::vector<Url> items) const
+{
+    if (_copyItems && !items.empty())
+        menu.push_back({.title = localized("Copy"),
+            .handler = [copy = _copyItems, items = std::move(items)] { copy(items); },
+            .image = {}});
+}
+
 void DocumentListController::addTrashEntry(kit::Menu& menu, std::vector<Url> items) const
 {
     const auto isRefused = [this](const Url& item) { return refuses(DocumentListAction::Delete, item); };
@@ -92,6 +100,7 @@ kit::Menu DocumentListController::optionsMenu()
         menu.push_back({.title = localized("Select None"),
             .handler = weakly(this, &DocumentListController::deselectAllItems)});
         addDownloadEntries(menu, _downloadVerbs, selectedRowItems());
+        addCopyEntry(menu, selectedItems());
         addTagsEntry(menu, selectedItems());
         addTrashEntry(menu, selectedItems());
     }

@@ -97,6 +97,9 @@ public:
     /// these items. Without a function they do not.
     using EditTags = std::function<void(const std::vector<Url>& items)>;
     void setEditTags(EditTags editTags) { _editTags = std::move(editTags); }
+    /// The menus and Ctrl+C offer to copy an item or the selected items, and call this function with them.
+    using CopyItems = std::function<void(const std::vector<Url>& items)>;
+    void setCopyItems(CopyItems copyItems) { _copyItems = std::move(copyItems); }
     /// What the menus and keys offer to do with the trash. What has no function is not offered.
     struct TrashVerbs {
         std::function<void(const std::vector<Url>& items)> moveToTrash;
@@ -152,6 +155,7 @@ public:
     kit::Menu optionsMenu();
     void addTagsEntry(kit::Menu& menu, std::vector<Url> items) const;
     void addTrashEntry(kit::Menu& menu, std::vector<Url> items) const;
+    void addCopyEntry(kit::Menu& menu, std::vector<Url> items) const;
 
     /// Other classes attach objects to the list, which keeps them as long as it lives; null removes one. Ask
     /// with the type with which the object was attached, because the type is not checked.
@@ -209,6 +213,9 @@ private:
     kit::Menu menuFor(const RowItem& item);
     bool obey(kit::RowCommand command, const RowItem& item);
     bool moveToTrash(const RowItem& item);
+    bool copy(const RowItem& item);
+    /// Answers the selected items when this one is among them, else this one.
+    std::vector<Url> meantBy(const RowItem& item) const;
     bool peekAt(const RowItem& item);
     bool showPeekAt(const RowItem& item);
     void peekEnded();
@@ -242,6 +249,7 @@ private:
     std::size_t _lastAction = 0;
     DocumentListActionSet _availableActions = 0;
     EditTags _editTags;
+    CopyItems _copyItems;
     DownloadVerbs _downloadVerbs;
     TrashVerbs _trashVerbs;
     std::vector<FolderVerb> _folderVerbs;

@@ -118,6 +118,29 @@ TEST_F(AddingTest, AContainerWithoutFoldersTakesFilesAndPackages)
     EXPECT_FALSE(std::filesystem::exists(documents.path() + "/Photos"));
 }
 
+TEST_F(AddingTest, WhatIsHereIsCopiedForOtherPrograms)
+{
+    write("a.txt"), write("Trip/b.txt");
+    drive.makeFolder("Far");
+    drive.writePromise("Far/c.pdf", {});
+    drive.writePromise("d.pdf", {});
+    launch();
+    auto& sharing = dynamic_cast<RecordingSharing&>(platform::services().documentSharing());
+    const auto copy = [&](const std::vector<Url>& items) {
+        browser->copyItems(items);
+        settle();
+        return std::exchange(sharing.lines, {});
+    };
+    EXPECT_THAT(copy({url("a.txt")}), ElementsAre("copy file a.txt"));
+    EXPECT_THAT(copy({url("a.txt"), url("Trip")}), ElementsAre("copy file a.txt", "copy file Trip"));
+    EXPECT_THAT(takeNotices(), ElementsAre("“a.txt” was copied", "2 items were copied"));
+    EXPECT_THAT(copy({url("a.txt"), url("Far")}), IsEmpty());
+    EXPECT_EQ(takeAlert(), "“c.pdf” is still in the cloud, so it can’t be copied. Download it first.");
+    EXPECT_THAT(copy({url("d.pdf"), url("Far")}), IsEmpty());
+    EXPECT_EQ(takeAlert(), "2 documents are still in the cloud and can’t be copied. Download them first.");
+    EXPECT_THAT(takeNotices(), IsEmpty());
+}
+
 TEST_F(AddingTest, SaysWhatCouldNotBeAdded)
 {
     launch();

@@ -69,6 +69,28 @@ TEST_F(BrowseTests, AnItemGoesToANewFolderThroughThePicker)
     EXPECT_TRUE(eventually([this] { return !program->shows("Undo"); })) << "its message went";
 }
 
+TEST_F(BrowseTests, WhatIsCopiedInOneFolderIsPastedInAnother)
+{
+    start();
+    program->press("Desktop");
+    ASSERT_TRUE(eventually([this] { return program->shows("To do.txt"); }));
+    EXPECT_TRUE(program->buttons("To do.txt").back().perform("row.menu"));
+    program->press("Copy");
+    EXPECT_TRUE(eventually([this] { return program->says("“To do.txt” was copied"); }));
+    for (const auto* name : {"To do.txt", "To do 2.txt"}) {
+        program->pressUntil("Back", [this] { return program->shows("Photos"); });
+        program->press("Photos");
+        ASSERT_TRUE(eventually([this] { return program->shows("Winter hike"); }));
+        pressKey('v', Modifier::Control);
+        expectShown(name);
+        EXPECT_TRUE(std::filesystem::exists(top / "Photos" / name));
+    }
+    pressKey('z', Modifier::Control);
+    expectGone("To do 2.txt");
+    EXPECT_TRUE(std::filesystem::exists(top / "Photos/To do.txt"));
+    EXPECT_TRUE(std::filesystem::exists(top / "Desktop/To do.txt"));
+}
+
 TEST_F(BrowseTests, ADownloadIsRemovedAndComesBack)
 {
     start();

@@ -14,6 +14,11 @@ namespace testing_support {
 class RecordingSharing : public platform::DocumentSharing {
 public:
     void copyText(const std::string& text) override { lines.push_back("copy " + text); }
+    void copyFiles(const std::vector<platform::Url>& files) override
+    {
+        for (const auto& file : files)
+            lines.push_back("copy file " + file.lastPathComponent());
+    }
     bool canSendByMail() const override { return hasMailer; }
     void sendByMail(const platform::Url& document, Completion completion) override
     {

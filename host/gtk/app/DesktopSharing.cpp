@@ -124,6 +124,15 @@ void DesktopSharing::copyText(const std::string& text)
         gdk_clipboard_set_text(gdk_display_get_clipboard(display), text.c_str());
 }
 
+void DesktopSharing::copyFiles(const std::vector<Url>& files)
+{
+    auto* display = gdk_display_get_default();
+    if (!display)
+        return;
+    const auto content = ObjectRef<GdkContentProvider>::adopt(contentOf(files));
+    gdk_clipboard_set_content(gdk_display_get_clipboard(display), content.get());
+}
+
 bool DesktopSharing::canSendByMail() const
 {
     const std::unique_ptr<char, decltype(&g_free)> program(g_find_program_in_path("xdg-email"), g_free);

@@ -28,6 +28,7 @@ public:
 
     void chooseFiles(Chosen chosen) override;
     void copyText(const std::string& text) override;
+    void copyFiles(const std::vector<platform::Url>& files) override;
     bool canSendByMail() const override;
     void sendByMail(const platform::Url& document, Completion completion) override;
     void showInFileManager(const platform::Url& item, Completion completion) override;

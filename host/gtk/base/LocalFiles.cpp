@@ -34,4 +34,26 @@ LocalFiles LocalFiles::of(const GSList* files)
     return found;
 }
 
+GdkContentProvider* contentOf(const std::vector<platform::Url>& files)
+{
+    std::string copied = "copy";
+    GSList* list = nullptr;
+    for (const auto& url : files) {
+        auto* file = g_file_new_for_path(url.path().c_str());
+        const std::unique_ptr<char, decltype(&g_free)> uri(g_file_get_uri(file), g_free);
+        copied.append("\n").append(uri.get());
+        list = g_slist_prepend(list, file);
+    }
+    list = g_slist_reverse(list);
+    GValue value = G_VALUE_INIT;
+    g_value_init(&value, GDK_TYPE_FILE_LIST);
+    g_value_take_boxed(&value, list);
+    auto* bytes = g_bytes_new(copied.data(), copied.size());
+    GdkContentProvider* forms[] = {gdk_content_provider_new_for_value(&value),
+        gdk_content_provider_new_for_bytes("x-special/gnome-copied-files", bytes)};
+    g_bytes_unref(bytes);
+    g_value_unset(&value);
+    return gdk_content_provider_new_union(forms, 2);
+}
+
 } // namespace host::gtk

@@ -5,7 +5,7 @@
 
 #include "platform/Url.h"
 
-#include <gio/gio.h>
+#include <gdk/gdk.h>
 
 #include <vector>
 
@@ -20,5 +20,10 @@ struct LocalFiles {
     static LocalFiles of(GListModel* files);
     static LocalFiles of(const GSList* files);
 };
+
+/// Answers a new provider of files for the clipboard or a drag, in the forms that programs ask for: the
+/// toolkit's list of files with all that it is converted to, and the list of copied files that file managers
+/// have.
+GdkContentProvider* contentOf(const std::vector<platform::Url>& files);
 
 } // namespace host::gtk

@@ -40,6 +40,7 @@ constexpr CommandKey commandKeys[] = {
     {GDK_KEY_KP_Delete, GDK_SHIFT_MASK, kit::RowCommand::DeleteForGood},
     {GDK_KEY_Return, GDK_ALT_MASK, kit::RowCommand::Info},
     {GDK_KEY_space, noModifiers, kit::RowCommand::Peek},
+    {GDK_KEY_c, GDK_CONTROL_MASK, kit::RowCommand::Copy},
 };
 
 /// Answers whether a key moves or does something, and so ends the text that is being typed.

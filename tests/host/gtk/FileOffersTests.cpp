@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: GPL-3.0-or-later
 
 #include "WindowFixture.h"
+#include "host/gtk/base/LocalFiles.h"
 #include "host/gtk/base/ObjectRef.h"
 #include "kit/controllers/ViewController.h"
 
@@ -89,6 +90,27 @@ TEST_F(FileOffersTests, FilesOnTheClipboardArePasted)
     EXPECT_TRUE(paste());
     waitFor([&] { return !screen->offered.empty(); }, "the clipboard");
     EXPECT_THAT(screen->offered, ElementsAre("/tmp/a b", "/tmp/d"));
+}
+
+TEST_F(FileOffersTests, WhatIsCopiedIsWhatOtherProgramsFindAndIsPastedAgain)
+{
+    show(screen);
+    auto* clipboard = gtk_widget_get_clipboard(windowWidget());
+    const std::vector<std::string> paths{"/tmp/a b%.txt", "/tmp/ü\n.txt", "/tmp/Trip"};
+    std::vector<platform::Url> files;
+    for (const auto& path : paths)
+        files.push_back(platform::Url::fileURL(path));
+    gdk_clipboard_set_content(
+        clipboard, ObjectRef<GdkContentProvider>::adopt(host::gtk::contentOf(files)).get());
+    const std::unique_ptr<GdkContentFormats, decltype(&gdk_content_formats_unref)> formats(
+        gdk_content_formats_union_serialize_mime_types(
+            gdk_content_formats_ref(gdk_clipboard_get_formats(clipboard))),
+        gdk_content_formats_unref);
+    for (const char* type : {"text/uri-list", "x-special/gnome-copied-files"})
+        EXPECT_TRUE(gdk_content_formats_contain_mime_type(formats.get(), type)) << type;
+    EXPECT_TRUE(paste());
+    waitFor([&] { return screen->offered.size() == paths.size(); }, "the clipboard");
+    EXPECT_EQ(screen->offered, paths);
 }
 
 TEST_F(FileOffersTests, FilesThatAreDroppedAreOffered)

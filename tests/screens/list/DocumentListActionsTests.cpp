@@ -96,6 +96,40 @@ TEST_F(DocumentList, OffersTheEnabledActionsByMenuAndKeys)
     EXPECT_EQ(delegate->take(), (Lines{"action 2 Notes.txt", "action 3 Notes.txt"}));
 }
 
+TEST_F(DocumentList, CopiesByMenuAndKeyWhatIsHereAndNoLibraries)
+{
+    makePaintLibrary();
+    const auto list = shownList(*DocumentListController::createRootList()->presentedURL());
+    deliver(list, {{"a.txt"}, {"b.txt"}, {.name = "far.txt", .isPromise = true}});
+    list->setAvailableActions(125);
+    Lines copied;
+    list->setCopyItems([&](const std::vector<Url>& items) {
+        for (const auto& item : items)
+            copied.push_back(item.lastPathComponent());
+    });
+    const auto choose = [&](kit::Menu menu) {
+        const auto entry = std::ranges::find(menu, "Copy", &kit::MenuAction::title);
+        if (entry != menu.end())
+            entry->handler();
+        return std::exchange(copied, {});
+    };
+    auto& rows = *list->listView();
+    EXPECT_EQ(choose(rows.menuForRow(0)), Lines()) << "a library";
+    EXPECT_EQ(choose(rows.menuForRow(1)), (Lines{"a.txt"}));
+    EXPECT_EQ(choose(rows.menuForRow(3)), Lines()) << "in the cloud";
+    const auto press = [&](std::size_t row) {
+        rows.commandRow(row, kit::RowCommand::Copy);
+        return std::exchange(copied, {});
+    };
+    EXPECT_EQ(press(0), Lines());
+    EXPECT_EQ(press(3), (Lines{"far.txt"})) << "the answer says why it cannot be";
+    list->setEditingAnimated(true, false);
+    list->setSelectedItems({drive.url("a.txt"), drive.url("b.txt")});
+    EXPECT_EQ(press(1), (Lines{"a.txt", "b.txt"}));
+    EXPECT_EQ(press(3), (Lines{"far.txt"})) << "it is not among the selected ones";
+    EXPECT_EQ(choose(rows.menuForList()), (Lines{"a.txt", "b.txt"}));
+}
+
 TEST_F(DocumentList, OffersTheTrashBesideDeletionButNotToLibraries)
 {
     makePaintLibrary();
