@@ -230,6 +230,12 @@ bool ListView::commandRow(std::size_t index, RowCommand command)
     return delegate && isItem(index) && hasMeaning && delegate->rowCommand(*this, index, command);
 }
 
+std::vector<platform::Url> ListView::filesToDrag(std::size_t index)
+{
+    const auto delegate = _listDelegate.lock();
+    return delegate && isItem(index) ? delegate->filesToDrag(*this, index) : std::vector<platform::Url>();
+}
+
 bool ListView::holdRow(std::size_t index)
 {
     const auto delegate = _listDelegate.lock();

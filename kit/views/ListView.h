@@ -62,6 +62,7 @@ public:
     Menu menuForRow(std::size_t index);
     Menu menuForList();
     bool commandRow(std::size_t index, RowCommand command);
+    std::vector<platform::Url> filesToDrag(std::size_t index);
     bool holdRow(std::size_t index);
     void pressOnHeldRow(); ///< the finger that held the row pressed on, to open it
     /// Answers the row that the typed text leads to, see ListViewDataSource::rowBeginningWith().

@@ -5,8 +5,10 @@
 
 #include "kit/values/ListChanges.h"
 #include "kit/values/Menu.h"
+#include "platform/Url.h"
 
 #include <cstddef>
+#include <vector>
 
 namespace kit {
 
@@ -29,6 +31,8 @@ public:
     virtual Menu menuForList(ListView&) { return {}; }
     /// The user pressed a key that acts on a row. Answers false when the key means nothing here.
     virtual bool rowCommand(ListView&, std::size_t /*index*/, RowCommand) { return false; }
+    /// Answers the files that the user drags from a row to another program; none when nothing can be dragged.
+    virtual std::vector<platform::Url> filesToDrag(ListView&, std::size_t /*index*/) { return {}; }
     /// The user began to select by the keyboard while the list was not in selection mode. The delegate may
     /// answer by entering selection mode.
     virtual void selectionRequested(ListView&) { }

@@ -316,6 +316,26 @@ bool DocumentListController::moveToTrash(const RowItem& item)
     return true;
 }
 
+/// Only documents that are here are dragged, because a folder may hold what is still in the cloud, and there
+/// is no time to look.
+std::vector<Url> DocumentListController::filesToDrag(kit::ListView&, std::size_t index)
+{
+    const auto item = itemAt(index);
+    if (!item)
+        return {};
+    auto dragged = _editing ? selectedRowItems() : std::vector<RowItem>();
+    if (std::ranges::find(dragged, item->url, &RowItem::url) == dragged.end())
+        dragged = {*item};
+    const auto isDocumentHere = [](const RowItem& each) {
+        return !each.isPromise
+            && (each.kind == FolderEntryKind::Document || each.kind == FolderEntryKind::Package);
+    };
+    std::vector<Url> files;
+    if (std::ranges::all_of(dragged, isDocumentHere))
+        std::ranges::transform(dragged, std::back_inserter(files), &RowItem::url);
+    return files;
+}
+
 bool DocumentListController::copy(const RowItem& item)
 {
     if (!_copyItems || item.kind == FolderEntryKind::Library)

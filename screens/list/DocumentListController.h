@@ -183,6 +183,7 @@ private:
     void selectionDidChange(kit::ListView& list) override;
     void refreshRequested(kit::ListView& list) override;
     bool rowCommand(kit::ListView& list, std::size_t index, kit::RowCommand command) override;
+    std::vector<Url> filesToDrag(kit::ListView& list, std::size_t index) override;
     bool rowHeld(kit::ListView& list, std::size_t index) override;
     void heldRowPressedOn(kit::ListView& list) override;
     void selectionRequested(kit::ListView& list) override;

@@ -176,6 +176,7 @@ void ListViewPeer::connectInput()
         click, "pressed", [this](int, double x, double y) { showMenuOfList(x, y); }));
     connectMarks();
     connectStrayingFinger();
+    connectDragging();
 }
 
 void ListViewPeer::setUpRow(GtkListItem* item)

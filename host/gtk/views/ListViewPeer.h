@@ -55,6 +55,8 @@ private:
     void connectInput();
     void connectMarks();
     void connectStrayingFinger();
+    void connectDragging();
+    GdkContentProvider* beginDrag(GtkDragSource* source, double x, double y) const;
     void followFinger(GdkEvent* event);
     void setUpRow(GtkListItem* item);
     void bindRow(GtkListItem* item);

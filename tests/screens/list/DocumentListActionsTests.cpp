@@ -96,7 +96,7 @@ TEST_F(DocumentList, OffersTheEnabledActionsByMenuAndKeys)
     EXPECT_EQ(delegate->take(), (Lines{"action 2 Notes.txt", "action 3 Notes.txt"}));
 }
 
-TEST_F(DocumentList, CopiesByMenuAndKeyWhatIsHereAndNoLibraries)
+TEST_F(DocumentList, CopiesAndDragsWhatIsHereAndNoLibraries)
 {
     makePaintLibrary();
     const auto list = shownList(*DocumentListController::createRootList()->presentedURL());
@@ -123,8 +123,20 @@ TEST_F(DocumentList, CopiesByMenuAndKeyWhatIsHereAndNoLibraries)
     };
     EXPECT_EQ(press(0), Lines());
     EXPECT_EQ(press(3), (Lines{"far.txt"})) << "the answer says why it cannot be";
+    const auto drag = [&](std::size_t row) {
+        Lines names;
+        for (const auto& file : rows.filesToDrag(row))
+            names.push_back(file.lastPathComponent());
+        return names;
+    };
+    for (const std::size_t row : {0, 3})
+        EXPECT_EQ(drag(row), Lines());
+    EXPECT_EQ(drag(1), (Lines{"a.txt"}));
     list->setEditingAnimated(true, false);
+    list->setSelectedItems({drive.url("a.txt"), drive.url("far.txt")});
+    EXPECT_EQ(drag(1), Lines()) << "one of the selected ones is in the cloud";
     list->setSelectedItems({drive.url("a.txt"), drive.url("b.txt")});
+    EXPECT_EQ(drag(1), (Lines{"a.txt", "b.txt"}));
     EXPECT_EQ(press(1), (Lines{"a.txt", "b.txt"}));
     EXPECT_EQ(press(3), (Lines{"far.txt"})) << "it is not among the selected ones";
     EXPECT_EQ(choose(rows.menuForList()), (Lines{"a.txt", "b.txt"}));
