@@ -1,12 +1,12 @@
 // SPDX-FileCopyrightText: 2026 The Tarrow Drive authors
 // SPDX-License-Identifier: GPL-3.0-or-later
 
-#include "host/drive/records/SmallFile.h"
 #include "host/drive/changes/ContentCollection.h"
 #include "host/drive/changes/DownloadWork.h"
 #include "host/drive/changes/ItemTraits.h"
 #include "host/drive/changes/LocalCloudStore.h"
 #include "host/drive/records/ItemFacts.h"
+#include "host/drive/records/SmallFile.h"
 #include "tests/support/DownloadFixture.h"
 
 #include <fcntl.h>

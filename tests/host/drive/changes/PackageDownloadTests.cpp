@@ -15,8 +15,6 @@ namespace {
 namespace fs = std::filesystem;
 
 using namespace host::drive;
-using host::system::FileDescriptor;
-using host::system::SystemError;
 using namespace platform;
 using testing_support::alone;
 using testing_support::contentOf;
